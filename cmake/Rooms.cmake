@@ -1,0 +1,27 @@
+# Each room of the source tree is one static library; includes are written from the root, so
+# that every include line names the room it reaches into.
+
+# sensor_profile_room(NAME SOURCES ... [USES public libraries ...] [PRIVATELY private libraries ...])
+function(sensor_profile_room name)
+  cmake_parse_arguments(room "" "" "SOURCES;USES;PRIVATELY" ${ARGN})
+  add_library(${name} STATIC ${room_SOURCES})
+  target_include_directories(${name} PUBLIC "${PROJECT_SOURCE_DIR}")
+  target_link_libraries(${name} PUBLIC ${room_USES} PRIVATE ${room_PRIVATELY})
+endfunction()
+
+# sensor_profile_test(NAME SOURCES ... USES libraries ... [ENVIRONMENT variables ...] [DATA])
+# One GoogleTest executable, registered with CTest.
+function(sensor_profile_test name)
+  cmake_parse_arguments(test "" "" "SOURCES;USES;ENVIRONMENT" ${ARGN})
+  add_executable(${name} ${test_SOURCES})
+  target_include_directories(${name} PRIVATE "${PROJECT_SOURCE_DIR}")
+  target_link_libraries(${name} PRIVATE ${test_USES} GTest::gmock GTest::gtest_main)
+  target_compile_definitions(${name} PRIVATE
+    SENSOR_PROFILE_SOURCE_DIR="${PROJECT_SOURCE_DIR}"
+    SENSOR_PROFILE_BINARY_DIR="${PROJECT_BINARY_DIR}")
+  add_test(NAME ${name} COMMAND ${name})
+  # The settings of the person who runs the tests must not reach them.
+  set_tests_properties(${name} PROPERTIES
+    ENVIRONMENT "RYNLOG_LOG=off;RYNLOG_TRACE=off;LC_ALL=C.UTF-8;${test_ENVIRONMENT}"
+    TIMEOUT 300)
+endfunction()

@@ -1,0 +1,35 @@
+# Language level, warnings, sanitizers and hardening, the same for every room.
+
+set(CMAKE_CXX_STANDARD 20)
+set(CMAKE_CXX_STANDARD_REQUIRED ON)
+set(CMAKE_CXX_EXTENSIONS OFF)
+set(CMAKE_POSITION_INDEPENDENT_CODE ON)
+set(CMAKE_CXX_VISIBILITY_PRESET hidden)
+set(CMAKE_VISIBILITY_INLINES_HIDDEN ON)
+set(CMAKE_EXPORT_COMPILE_COMMANDS ON)
+set(CMAKE_LIBRARY_OUTPUT_DIRECTORY "${CMAKE_BINARY_DIR}/lib")
+set(CMAKE_RUNTIME_OUTPUT_DIRECTORY "${CMAKE_BINARY_DIR}/bin")
+
+add_compile_options(-Wall -Wextra -Wpedantic -Wconversion -Wshadow -Werror)
+add_compile_options(-fstack-protector-strong)
+add_link_options(-Wl,-z,relro,-z,now)
+
+# Unique symbols would keep the provider library in memory after dlclose.
+if(CMAKE_CXX_COMPILER_ID STREQUAL "GNU")
+  add_compile_options(-fno-gnu-unique)
+endif()
+
+if(SENSOR_PROFILE_SANITIZE)
+  add_compile_options(-fsanitize=${SENSOR_PROFILE_SANITIZE} -fno-omit-frame-pointer)
+  add_link_options(-fsanitize=${SENSOR_PROFILE_SANITIZE})
+  if(SENSOR_PROFILE_SANITIZE MATCHES "undefined")
+    add_compile_options(-fno-sanitize-recover=undefined)
+  endif()
+elseif(CMAKE_BUILD_TYPE STREQUAL "Release")
+  add_compile_definitions(_FORTIFY_SOURCE=2)
+endif()
+
+if(SENSOR_PROFILE_COVERAGE)
+  add_compile_options(--coverage)
+  add_link_options(--coverage)
+endif()
