@@ -1,0 +1,132 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "platform/logging/Channels.h"
+
+#include "platform/logging/Sinks.h"
+
+#include <spdlog/logger.h>
+
+#include <atomic>
+#include <limits>
+#include <mutex>
+#include <stdexcept>
+#include <utility>
+
+namespace RynLog {
+
+namespace {
+
+constexpr int messageLevel = 6000;
+
+std::unique_ptr<spdlog::logger> makeLogger(const std::string& setting)
+{
+    const auto parsed = parseSinkSetting(setting);
+    if (!parsed)
+        throw std::invalid_argument("no such log sink: " + setting);
+    auto sink = makeSink(*parsed);
+    if (!sink)
+        return nullptr;
+    // Not registered anywhere: spdlog's registry belongs to the process. Errors are kept from
+    // standard error, where spdlog reports them by default.
+    auto logger = std::make_unique<spdlog::logger>(std::string(), std::move(sink));
+    logger->set_level(spdlog::level::trace);
+    logger->set_error_handler([](const std::string&) {});
+    return logger;
+}
+
+// One step above every level, so that the level test alone answers for closed channels.
+constexpr long long nothingWanted = std::numeric_limits<long long>::max();
+constexpr long long notConfigured = std::numeric_limits<long long>::min();
+
+// What stays usable while the library is unloaded or the process ends: threads may still log.
+constinit std::atomic<long long> wantedLevel{notConfigured};
+constinit std::mutex guard; // of all below
+constinit bool unloading = false;
+
+struct Current {
+    std::shared_ptr<const Channels> channels;
+
+    ~Current()
+    {
+        const std::lock_guard lock(guard);
+        unloading = true;
+        wantedLevel.store(nothingWanted, std::memory_order_relaxed);
+    }
+};
+constinit Current current;
+
+void reportProblem(const Channels& channels, const std::string& problem)
+{
+    const Origin origin{"reportProblem", "Channels", __LINE__};
+    if (!problem.empty() && channels.log.isOpen() && channels.level <= messageLevel)
+        channels.log.write(messageLevel, origin, "RynLog", problem);
+}
+
+// REQUIRES: the guard is held.
+void install(std::shared_ptr<const Channels> channels)
+{
+    const bool leadsSomewhere = channels->log.isOpen() || channels->trace.isOpen();
+    wantedLevel.store(leadsSomewhere ? channels->level : nothingWanted, std::memory_order_relaxed);
+    current.channels.swap(channels);
+}
+
+// REQUIRES: the guard is held.
+void configureAtFirstUse()
+{
+    const Configuration configuration = configurationFromEnvironment();
+    auto channels = std::make_shared<const Channels>(configuration);
+    reportProblem(*channels, configuration.problem);
+    install(std::move(channels));
+}
+
+} // namespace
+
+Channel::Channel(std::string name, const std::string& setting)
+    : name_(std::move(name)), logger_(makeLogger(setting))
+{
+}
+
+Channel::~Channel() = default;
+
+void Channel::write(
+    int level, const Origin& origin, std::string_view component, std::string_view text) const
+{
+    const std::string line = formatLine(name_, level, origin, component, text);
+    const auto severity = level >= messageLevel ? spdlog::level::warn : spdlog::level::debug;
+    logger_->log(severity, spdlog::string_view_t(line));
+}
+
+Channels::Channels(const Configuration& configuration)
+    : level(configuration.level), log("log", configuration.log), trace("trace", configuration.trace)
+{
+}
+
+std::shared_ptr<const Channels> activeChannels()
+{
+    const std::lock_guard lock(guard);
+    if (unloading)
+        return nullptr;
+    if (!current.channels)
+        configureAtFirstUse();
+    return current.channels;
+}
+
+bool anyChannelWants(int level) noexcept
+try {
+    if (wantedLevel.load(std::memory_order_relaxed) == notConfigured)
+        activeChannels();
+    return level >= wantedLevel.load(std::memory_order_relaxed);
+} catch (...) {
+    return false;
+}
+
+void configure(const Configuration& configuration)
+{
+    auto channels = std::make_shared<const Channels>(configuration);
+    reportProblem(*channels, configuration.problem);
+    const std::lock_guard lock(guard);
+    if (!unloading)
+        install(std::move(channels));
+}
+
+} // namespace RynLog

@@ -1,0 +1,30 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// Where the two channels lead and which lines are wanted.
+
+#pragma once
+
+#include <string>
+
+namespace RynLog {
+
+struct Configuration {
+    int level = 6000;           // RYNLOG_LEVEL: lowest level written
+    std::string log = "syslog"; // RYNLOG_LOG: syslog, stderr, file:PATH or off
+    std::string trace = "off";  // RYNLOG_TRACE: the same values
+    std::string problem{};      // what was wrong with the settings, in words; empty when nothing
+};
+
+// What the environment says, read with secure_getenv; an empty variable counts as not set.
+// A value that makes no sense is named in `problem` and its default is taken.
+Configuration configurationFromEnvironment();
+
+// Replaces the configuration that took effect at first use, which is the environment's. Lines
+// under way on other threads are finished with the one they began with. A `problem` becomes the
+// first line of the log channel. A file is created when missing and always appended to; it stays
+// open until the next configuration or until the library is unloaded. One that cannot be opened
+// is reported to syslog, once, and the lines of its channel are lost.
+// Throws std::invalid_argument naming a sink that makes no sense; nothing is replaced then.
+void configure(const Configuration& configuration);
+
+} // namespace RynLog

@@ -1,0 +1,44 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "platform/logging/RynLogger.h"
+
+#include "platform/logging/Channels.h"
+
+namespace RynLog {
+
+namespace {
+
+void write(Channel Channels::*channel, int level, const Origin& origin,
+    const std::string& component, const std::string& text) noexcept
+try {
+    if (!anyChannelWants(level))
+        return;
+    const auto channels = activeChannels();
+    if (channels && level >= channels->level && ((*channels).*channel).isOpen())
+        ((*channels).*channel).write(level, origin, component, text);
+} catch (...) {
+    // The line is lost: a caller is never disturbed by its own diagnostics.
+}
+
+} // namespace
+
+void RynLogger::logLevelMessage(const char* function, const char* file, unsigned line,
+    const std::string& component, int level, const char*, int, int,
+    const std::string& text) noexcept
+{
+    write(&Channels::log, level, {function, file, line}, component, text);
+}
+
+void RynLogger::traceLevelMessage(const char* function, const char* file, unsigned line,
+    const std::string& component, int level, const char*, int, int,
+    const std::string& text) noexcept
+{
+    write(&Channels::trace, level, {function, file, line}, component, text);
+}
+
+bool RynLogger::isWanted(int level) noexcept
+{
+    return anyChannelWants(level);
+}
+
+} // namespace RynLog

@@ -1,0 +1,128 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "platform/logging/Sinks.h"
+
+#include "platform/logging/LineFormat.h"
+#include "platform/logging/PipeSignal.h"
+
+#include <spdlog/pattern_formatter.h>
+#include <spdlog/sinks/base_sink.h>
+
+#include <cerrno>
+#include <mutex>
+#include <string_view>
+#include <system_error>
+#include <utility>
+
+#include <fcntl.h>
+#include <syslog.h>
+#include <unistd.h>
+
+namespace RynLog {
+
+namespace {
+
+using LockedSink = spdlog::sinks::base_sink<std::mutex>;
+
+void writeWhole(int descriptor, std::string_view bytes)
+{
+    const PipeSignalBlocked pipeSignal;
+    while (!bytes.empty()) {
+        const ssize_t written = ::write(descriptor, bytes.data(), bytes.size());
+        if (written > 0)
+            bytes.remove_prefix(static_cast<std::size_t>(written));
+        else if (written == 0 || errno != EINTR)
+            break;
+    }
+    if (!bytes.empty() && errno == EPIPE)
+        pipeSignal.discard();
+}
+
+// One line is one write to an open file, unbuffered, so that lines of several threads and
+// processes stay whole.
+class DescriptorSink : public LockedSink {
+public:
+    explicit DescriptorSink(int descriptor)
+        : LockedSink(std::make_unique<spdlog::pattern_formatter>(
+              "%Y-%m-%dT%H:%M:%S.%fZ %v", spdlog::pattern_time_type::utc, "\n")),
+          descriptor_(descriptor)
+    {
+    }
+
+protected:
+    void sink_it_(const spdlog::details::log_msg& message) override
+    {
+        spdlog::memory_buf_t line;
+        formatter_->format(message, line);
+        writeWhole(descriptor_, std::string_view(line.data(), line.size()));
+    }
+
+    void flush_() override {}
+
+private:
+    int descriptor_;
+};
+
+class FileSink : public DescriptorSink {
+public:
+    // Takes over the descriptor.
+    explicit FileSink(int descriptor) : DescriptorSink(descriptor), owned_(descriptor) {}
+    ~FileSink() override { ::close(owned_); }
+    FileSink(const FileSink&) = delete;
+    FileSink& operator=(const FileSink&) = delete;
+
+private:
+    int owned_;
+};
+
+// Never calls openlog or closelog: the identity belongs to the process.
+class SyslogSink : public LockedSink {
+protected:
+    void sink_it_(const spdlog::details::log_msg& message) override
+    {
+        const int severity = message.level >= spdlog::level::warn ? LOG_WARNING : LOG_DEBUG;
+        const std::string line(message.payload.data(), message.payload.size());
+        ::syslog(LOG_DAEMON | severity, "%s", line.c_str());
+    }
+
+    void flush_() override {}
+};
+
+void reportUnopened(const std::string& path, int error)
+{
+    std::string line = "cannot open the log file ";
+    appendEscaped(line, path);
+    line += ": " + std::generic_category().message(error) + "; its lines are lost";
+    ::syslog(LOG_DAEMON | LOG_WARNING, "%s", line.c_str());
+}
+
+std::shared_ptr<spdlog::sinks::sink> openFile(const std::string& path)
+{
+    // Non-blocking, as a pipe that nobody reads must not hold up a request.
+    constexpr int flags = O_WRONLY | O_CREAT | O_APPEND | O_CLOEXEC | O_NOCTTY | O_NONBLOCK;
+    constexpr mode_t ownerWritesGroupReads = 0640;
+    const int descriptor = ::open(path.c_str(), flags, ownerWritesGroupReads);
+    if (descriptor >= 0)
+        return std::make_shared<FileSink>(descriptor);
+    reportUnopened(path, errno);
+    return nullptr;
+}
+
+} // namespace
+
+std::shared_ptr<spdlog::sinks::sink> makeSink(const SinkSetting& setting)
+{
+    switch (setting.kind) {
+    case SinkSetting::Kind::syslog:
+        return std::make_shared<SyslogSink>();
+    case SinkSetting::Kind::standardError:
+        return std::make_shared<DescriptorSink>(STDERR_FILENO);
+    case SinkSetting::Kind::file:
+        return openFile(setting.path);
+    case SinkSetting::Kind::off:
+        break;
+    }
+    return nullptr;
+}
+
+} // namespace RynLog

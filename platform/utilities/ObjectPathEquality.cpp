@@ -1,0 +1,157 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "platform/utilities/KeyValue.h"
+#include "platform/utilities/ProviderUtilities.h"
+
+#include <cmpift.h>
+
+#include <algorithm>
+#include <optional>
+#include <utility>
+#include <vector>
+
+namespace Vorn {
+
+namespace {
+
+constexpr int deepestPath = 8;
+
+struct Key {
+    std::string_view name;
+    KeyValue value;
+};
+
+// CIM names are ASCII or compared as such; the process's locale has no say.
+char lowered(char character)
+{
+    return character >= 'A' && character <= 'Z' ? static_cast<char>(character - 'A' + 'a')
+                                                : character;
+}
+
+bool sameName(std::string_view a, std::string_view b)
+{
+    return std::equal(a.begin(), a.end(), b.begin(), b.end(),
+        [](char x, char y) { return lowered(x) == lowered(y); });
+}
+
+bool isUsable(const CMPIObjectPath* path)
+{
+    return path != nullptr && path->hdl != nullptr && path->ft != nullptr;
+}
+
+std::string_view className(const CMPIObjectPath* path)
+{
+    CMPIStatus status{};
+    CMPIString* const name = path->ft->getClassName(path, &status);
+    return status.rc == CMPI_RC_OK ? textOf(name) : std::string_view();
+}
+
+std::string_view namespaceOf(const CMPIObjectPath* path)
+{
+    CMPIStatus status{};
+    CMPIString* const name = path->ft->getNameSpace(path, &status);
+    std::string_view text = status.rc == CMPI_RC_OK ? textOf(name) : std::string_view();
+    while (text.starts_with('/'))
+        text.remove_prefix(1);
+    while (text.ends_with('/'))
+        text.remove_suffix(1);
+    return text;
+}
+
+bool sameNamespace(const CMPIObjectPath* a, const CMPIObjectPath* b)
+{
+    const std::string_view namespaceA = namespaceOf(a);
+    const std::string_view namespaceB = namespaceOf(b);
+    return namespaceA.empty() || namespaceB.empty() || sameName(namespaceA, namespaceB);
+}
+
+// The keys that count; nothing when the broker fails to list them.
+std::optional<std::vector<Key>> keysOf(const CMPIObjectPath* path, bool comparesReferences)
+{
+    CMPIStatus status{};
+    const CMPICount count = path->ft->getKeyCount(path, &status);
+    if (status.rc != CMPI_RC_OK)
+        return std::nullopt;
+    std::vector<Key> keys;
+    keys.reserve(std::min<CMPICount>(count, 8)); // few classes have more
+    for (CMPICount index = 0; index < count; ++index) {
+        CMPIString* name = nullptr;
+        const CMPIData data = path->ft->getKeyAt(path, index, &name, &status);
+        const std::string_view nameText = textOf(name);
+        if (status.rc != CMPI_RC_OK || nameText.empty())
+            return std::nullopt;
+        if (data.type == CMPI_ref && !comparesReferences)
+            continue;
+        const KeyValue value = keyValue(data);
+        if (!std::holds_alternative<KeyAbsent>(value))
+            keys.push_back({nameText, value});
+    }
+    return keys;
+}
+
+bool equalPaths(
+    const CMPIObjectPath* a, const CMPIObjectPath* b, bool comparesReferences, int depth);
+
+// Compares two values; each overload knows one type.
+struct ValueEquality {
+    bool comparesReferences;
+    int depth;
+
+    template <typename Value>
+    bool operator()(const Value& a, const Value& b) const
+    {
+        return a == b;
+    }
+    bool operator()(const CMPIObjectPath* a, const CMPIObjectPath* b) const
+    {
+        return equalPaths(a, b, comparesReferences, depth + 1);
+    }
+    bool operator()(KeyAbsent, KeyAbsent) const { return false; }
+    bool operator()(KeyUnusable, KeyUnusable) const { return false; }
+    template <typename Value, typename Other>
+    bool operator()(const Value&, const Other&) const
+    {
+        return false;
+    }
+};
+
+// Every key of one side has its own partner on the other, so that a name listed twice cannot
+// stand for another one.
+bool equalKeys(
+    const std::vector<Key>& keys, std::vector<Key> partners, const ValueEquality& sameValue)
+{
+    if (keys.size() != partners.size())
+        return false;
+    for (const Key& key : keys) {
+        const auto partner = std::find_if(partners.begin(), partners.end(),
+            [&](const Key& other) { return sameName(key.name, other.name); });
+        if (partner == partners.end() || !std::visit(sameValue, key.value, partner->value))
+            return false;
+        partners.erase(partner);
+    }
+    return true;
+}
+
+bool equalPaths(
+    const CMPIObjectPath* a, const CMPIObjectPath* b, bool comparesReferences, int depth)
+{
+    if (depth > deepestPath || !isUsable(a) || !isUsable(b))
+        return false;
+    const std::string_view name = className(a);
+    if (name.empty() || !sameName(name, className(b)) || !sameNamespace(a, b))
+        return false;
+    const auto keysA = keysOf(a, comparesReferences);
+    if (!keysA)
+        return false;
+    auto keysB = keysOf(b, comparesReferences);
+    return keysB && equalKeys(*keysA, *std::move(keysB), {comparesReferences, depth});
+}
+
+} // namespace
+
+bool isObjPathsEqual(const CMPIObjectPath* a, const CMPIObjectPath* b, bool comparesReferences)
+{
+    return equalPaths(a, b, comparesReferences, 0);
+}
+
+} // namespace Vorn

@@ -1,0 +1,59 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// A file that a sink writes to, and the shortest way to write a line.
+
+#pragma once
+
+#include "platform/logging/Configuration.h"
+#include "platform/logging/RynLogger.h"
+#include "tests/support/TemporaryFolder.h"
+
+#include <fstream>
+#include <string>
+#include <vector>
+
+namespace Testing {
+
+class LogFile {
+public:
+    std::string path() const { return (folder_.path() / "lines").string(); }
+    std::string sink() const { return "file:" + path(); }
+
+    std::vector<std::string> lines() const
+    {
+        std::vector<std::string> found;
+        std::ifstream in(path(), std::ios::binary);
+        for (std::string line; std::getline(in, line);)
+            found.push_back(line);
+        return found;
+    }
+
+private:
+    TemporaryFolder folder_;
+};
+
+// Closes both channels again, so that no test sees the lines of another.
+class ScopedConfiguration {
+public:
+    explicit ScopedConfiguration(const RynLog::Configuration& configuration)
+    {
+        RynLog::configure(configuration);
+    }
+    ~ScopedConfiguration() { RynLog::configure({6000, "off", "off"}); }
+    ScopedConfiguration(const ScopedConfiguration&) = delete;
+    ScopedConfiguration& operator=(const ScopedConfiguration&) = delete;
+};
+
+inline void logLine(const std::string& text, int level = 6000)
+{
+    RynLog::RynLogger::logLevelMessage(
+        "setVector", "Sensor", 740, "Nimbrel.Sensor", level, nullptr, 0, 0, text);
+}
+
+inline void traceLine(const std::string& text, int level = 6000)
+{
+    RynLog::RynLogger::traceLevelMessage(
+        "setVector", "Sensor", 740, "Nimbrel.Sensor", level, nullptr, 0, 0, text);
+}
+
+} // namespace Testing

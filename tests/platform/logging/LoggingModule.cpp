@@ -1,0 +1,14 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// What a provider library looks like to the process that loads it: it logs, and goes.
+
+#include "platform/logging/Configuration.h"
+#include "platform/logging/RynLogger.h"
+
+extern "C" __attribute__((visibility("default"))) void logOneLine(const char* path)
+{
+    const std::string sink = std::string("file:") + path;
+    RynLog::configure({6000, sink, sink});
+    RynLog::RynLogger::logLevelMessage(
+        "logOneLine", "LoggingModule", 1, "Test.Module", 6000, nullptr, 0, 0, "loaded");
+}

@@ -1,0 +1,91 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "tests/platform/logging/LogFile.h"
+#include "tests/platform/logging/SyslogCapture.h"
+
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+namespace {
+
+using testing::AllOf;
+using testing::HasSubstr;
+using Testing::logLine;
+using Testing::ScopedConfiguration;
+using Testing::takeSyslogLines;
+
+// RFC 5424: facility 3 (daemon) times 8, severity 4 (warning) and 7 (debug).
+constexpr int daemonWarning = 3 * 8 + 4;
+constexpr int daemonDebug = 3 * 8 + 7;
+
+class SyslogSink : public testing::Test {
+protected:
+    SyslogSink() { takeSyslogLines(); }
+};
+
+TEST_F(SyslogSink, WritesTheLineWithoutATime)
+{
+    const ScopedConfiguration configuration({3000, "syslog", "off"});
+    logLine("some text", 6000);
+    const auto lines = takeSyslogLines();
+    ASSERT_EQ(lines.size(), 1U);
+    EXPECT_EQ(lines[0].text, "log 6000 Nimbrel.Sensor setVector(Sensor:740) some text");
+}
+
+TEST_F(SyslogSink, MessagesAreWarningsAndMarksAreDebug)
+{
+    const ScopedConfiguration configuration({3000, "syslog", "off"});
+    for (const int level : {3000, 5999, 6000, 7000})
+        logLine("text", level);
+    const auto lines = takeSyslogLines();
+    ASSERT_EQ(lines.size(), 4U);
+    EXPECT_EQ(lines[0].priority, daemonDebug);
+    EXPECT_EQ(lines[1].priority, daemonDebug);
+    EXPECT_EQ(lines[2].priority, daemonWarning);
+    EXPECT_EQ(lines[3].priority, daemonWarning);
+}
+
+TEST_F(SyslogSink, TextIsNotTakenAsAFormatAndIsEscaped)
+{
+    const ScopedConfiguration configuration({6000, "syslog", "off"});
+    logLine("%s%n\nforged");
+    const auto lines = takeSyslogLines();
+    ASSERT_EQ(lines.size(), 1U);
+    EXPECT_THAT(lines[0].text, testing::EndsWith(" %s%n\\nforged"));
+}
+
+TEST_F(SyslogSink, TheProcessKeepsItsOwnSyslogSettings)
+{
+    const int before = Testing::syslogSettingsChanged();
+    {
+        const ScopedConfiguration configuration({6000, "syslog", "syslog"});
+        logLine("text");
+    }
+    EXPECT_EQ(Testing::syslogSettingsChanged(), before);
+}
+
+TEST_F(SyslogSink, AFileThatCannotBeOpenedIsReportedOnceAndItsLinesAreLost)
+{
+    testing::internal::CaptureStderr();
+    const ScopedConfiguration configuration({6000, "file:/nowhere\n/at all", "off"});
+    logLine("lost");
+    logLine("lost");
+    EXPECT_EQ(testing::internal::GetCapturedStderr(), "");
+    EXPECT_FALSE(RynLog::RynLogger::isWanted(6000));
+    const auto lines = takeSyslogLines();
+    ASSERT_EQ(lines.size(), 1U);
+    EXPECT_EQ(lines[0].priority, daemonWarning);
+    EXPECT_THAT(lines[0].text,
+        AllOf(HasSubstr("/nowhere\\n/at all"), HasSubstr("No such file or directory")));
+}
+
+TEST_F(SyslogSink, TheOtherChannelGoesOnWhenAFileCannotBeOpened)
+{
+    const Testing::LogFile file;
+    const ScopedConfiguration configuration({6000, "file:/nowhere/at/all", file.sink()});
+    logLine("lost");
+    Testing::traceLine("kept");
+    EXPECT_EQ(file.lines().size(), 1U);
+}
+
+} // namespace

@@ -1,0 +1,55 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "tests/platform/logging/LogFile.h"
+
+#include <gtest/gtest.h>
+
+#include <dlfcn.h>
+
+#include <fstream>
+#include <memory>
+
+namespace {
+
+using Testing::LogFile;
+
+std::size_t openDescriptors()
+{
+    const std::filesystem::directory_iterator descriptors("/proc/self/fd");
+    return static_cast<std::size_t>(std::distance(begin(descriptors), end(descriptors)));
+}
+
+bool isMapped(const std::string& library)
+{
+    std::ifstream maps("/proc/self/maps");
+    for (std::string line; std::getline(maps, line);)
+        if (line.find(library) != std::string::npos)
+            return true;
+    return false;
+}
+
+void loadLogAndUnload(const std::string& path)
+{
+    const std::unique_ptr<void, int (*)(void*)> library(
+        ::dlopen(LOGGING_MODULE, RTLD_NOW | RTLD_LOCAL), ::dlclose);
+    ASSERT_NE(library, nullptr) << ::dlerror();
+    const auto logOneLine =
+        reinterpret_cast<void (*)(const char*)>(::dlsym(library.get(), "logOneLine"));
+    ASSERT_NE(logOneLine, nullptr);
+    logOneLine(path.c_str());
+}
+
+TEST(Unload, ALibraryThatLoggedLeavesNoDescriptorAndNoMapping)
+{
+    const LogFile file;
+    loadLogAndUnload(file.path());
+    const std::size_t before = openDescriptors();
+    constexpr std::size_t rounds = 100;
+    for (std::size_t round = 1; round < rounds; ++round)
+        loadLogAndUnload(file.path());
+    EXPECT_EQ(openDescriptors(), before);
+    EXPECT_FALSE(isMapped(LOGGING_MODULE));
+    EXPECT_EQ(file.lines().size(), rounds);
+}
+
+} // namespace

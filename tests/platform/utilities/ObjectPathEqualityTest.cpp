@@ -1,0 +1,351 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "platform/utilities/ProviderUtilities.h"
+#include "tests/platform/utilities/FakePath.h"
+
+#include <gtest/gtest.h>
+
+#include <deque>
+#include <limits>
+#include <vector>
+
+namespace {
+
+using namespace Testing;
+using Vorn::isObjPathsEqual;
+
+constexpr auto sensorClass = "ZUMLO_NumericSensor";
+
+// Equality has no direction: both are tried.
+bool equal(const FakePath& a, const FakePath& b, bool comparesReferences = true)
+{
+    const bool forward = isObjPathsEqual(a.get(), b.get(), comparesReferences);
+    EXPECT_EQ(isObjPathsEqual(b.get(), a.get(), comparesReferences), forward);
+    return forward;
+}
+
+// Whether two paths are equal that differ in nothing but one key's value.
+bool equalValues(const CMPIData& a, const CMPIData& b)
+{
+    FakePath pathA("root", sensorClass), pathB("root", sensorClass);
+    return equal(pathA.key("K", a), pathB.key("K", b));
+}
+
+TEST(ObjectPathEquality, SameClassAndKeysAreEqual)
+{
+    FakePath a("root/cimv2", sensorClass), b("root/cimv2", sensorClass);
+    a.text("DeviceID", "/board/fan1").text("SystemName", "host");
+    b.text("DeviceID", "/board/fan1").text("SystemName", "host");
+    EXPECT_TRUE(equal(a, b));
+    EXPECT_TRUE(equal(a, a));
+}
+
+TEST(ObjectPathEquality, ClassNamesIgnoreCase)
+{
+    EXPECT_TRUE(equal({"root", "ZUMLO_NumericSensor"}, {"root", "zumlo_numericSENSOR"}));
+    EXPECT_FALSE(equal({"root", "ZUMLO_NumericSensor"}, {"root", "ZUMLO_NumericSensors"}));
+    EXPECT_FALSE(equal({"root", "ZUMLO[NumericSensor"}, {"root", "ZUMLO{NumericSensor"}));
+}
+
+TEST(ObjectPathEquality, APathWithoutAClassEqualsNothing)
+{
+    EXPECT_FALSE(equal({"root", std::nullopt}, {"root", std::nullopt}));
+    EXPECT_FALSE(equal({"root", ""}, {"root", ""}));
+    EXPECT_FALSE(equal({"root", sensorClass}, {"root", std::nullopt}));
+}
+
+TEST(ObjectPathEquality, NamespacesCountWhenBothSidesHaveOne)
+{
+    EXPECT_FALSE(equal({"root/cimv2", sensorClass}, {"root/interop", sensorClass}));
+    EXPECT_TRUE(equal({"root/cimv2", sensorClass}, {std::nullopt, sensorClass}));
+    EXPECT_TRUE(equal({"root/cimv2", sensorClass}, {"", sensorClass}));
+    EXPECT_TRUE(equal({std::nullopt, sensorClass}, {std::nullopt, sensorClass}));
+}
+
+TEST(ObjectPathEquality, NamespacesIgnoreCaseAndOuterSlashes)
+{
+    EXPECT_TRUE(equal({"/root/cimv2/", sensorClass}, {"Root/CIMv2", sensorClass}));
+    EXPECT_FALSE(equal({"root//cimv2", sensorClass}, {"root/cimv2", sensorClass}));
+}
+
+TEST(ObjectPathEquality, ANamespaceStringWithoutAHandleIsNone)
+{
+    FakePath a("root/cimv2", sensorClass), b("root/interop", sensorClass);
+    b.nameSpace.loseHandle();
+    EXPECT_TRUE(equal(a, b));
+}
+
+TEST(ObjectPathEquality, HostNamesAreIgnored)
+{
+    FakePath a("root", sensorClass), b("root", sensorClass);
+    a.hostName.text = "one";
+    b.hostName.text = "two";
+    EXPECT_TRUE(equal(a, b));
+}
+
+TEST(ObjectPathEquality, KeysMayComeInAnyOrderAndCase)
+{
+    FakePath a("root", sensorClass), b("root", sensorClass);
+    a.text("DeviceID", "1").text("SystemName", "2").text("X", "3");
+    b.text("x", "3").text("systemname", "2").text("DEVICEID", "1");
+    EXPECT_TRUE(equal(a, b));
+}
+
+TEST(ObjectPathEquality, EveryKeyCounts)
+{
+    FakePath all("root", sensorClass), some("root", sensorClass), none("root", sensorClass);
+    all.text("DeviceID", "1").text("SystemName", "2");
+    some.text("DeviceID", "1");
+    EXPECT_FALSE(equal(all, some));
+    EXPECT_FALSE(equal(some, none));
+}
+
+TEST(ObjectPathEquality, KeysOfDifferentNamesAreDifferent)
+{
+    FakePath a("root", sensorClass), b("root", sensorClass);
+    EXPECT_FALSE(equal(a.text("DeviceID", "1"), b.text("DeviceIDs", "1")));
+}
+
+TEST(ObjectPathEquality, ANameListedTwiceDoesNotStandForAnother)
+{
+    FakePath a("root", sensorClass), b("root", sensorClass);
+    a.text("K", "1").text("K", "1");
+    b.text("K", "1").text("L", "2");
+    EXPECT_FALSE(equal(a, b));
+}
+
+TEST(ObjectPathEquality, TextsAreComparedCharacterByCharacter)
+{
+    FakePath a("root", sensorClass), b("root", sensorClass), c("root", sensorClass);
+    a.text("DeviceID", "fan1");
+    EXPECT_FALSE(equal(a, b.text("DeviceID", "FAN1")));
+    EXPECT_FALSE(equal(a, c.text("DeviceID", "fan1 ")));
+}
+
+TEST(ObjectPathEquality, BothFormsOfATextAreEqual)
+{
+    FakePath a("root", sensorClass), b("root", sensorClass), c("root", sensorClass);
+    a.text("DeviceID", "fan1");
+    EXPECT_TRUE(equal(a, b.chars("DeviceID", "fan1")));
+    EXPECT_FALSE(equal(a, c.chars("DeviceID", "fan2")));
+}
+
+TEST(ObjectPathEquality, IntegersOfAnyTypeAreComparedByValue)
+{
+    const auto five = signedInteger(CMPI_sint64, 5);
+    for (const auto type :
+        std::vector<CMPIType>{CMPI_uint8, CMPI_uint16, CMPI_uint32, CMPI_uint64}) {
+        EXPECT_TRUE(equalValues(five, unsignedInteger(type, 5)));
+        EXPECT_FALSE(equalValues(five, unsignedInteger(type, 6)));
+    }
+    for (const auto type :
+        std::vector<CMPIType>{CMPI_sint8, CMPI_sint16, CMPI_sint32, CMPI_sint64}) {
+        EXPECT_TRUE(equalValues(five, signedInteger(type, 5)));
+        EXPECT_TRUE(equalValues(signedInteger(CMPI_sint64, -5), signedInteger(type, -5)));
+        EXPECT_FALSE(equalValues(five, signedInteger(type, -5)));
+    }
+}
+
+TEST(ObjectPathEquality, ANegativeIntegerIsNotTheLargePositiveOfTheSameBits)
+{
+    EXPECT_FALSE(equalValues(signedInteger(CMPI_sint64, -1),
+        unsignedInteger(CMPI_uint64, std::numeric_limits<CMPIUint64>::max())));
+}
+
+TEST(ObjectPathEquality, BooleansRealsAndCharactersAreComparedByValue)
+{
+    EXPECT_TRUE(equalValues(boolean(true), boolean(true)));
+    EXPECT_FALSE(equalValues(boolean(true), boolean(false)));
+    EXPECT_TRUE(equalValues(real(CMPI_real64, 1.5), real(CMPI_real64, 1.5)));
+    EXPECT_TRUE(equalValues(real(CMPI_real64, 1.5), real(CMPI_real32, 1.5)));
+    EXPECT_FALSE(equalValues(real(CMPI_real64, 1.5), real(CMPI_real64, 2.5)));
+    EXPECT_TRUE(equalValues(character(0x30BB), character(0x30BB)));
+    EXPECT_FALSE(equalValues(character(0x30BB), character(0x30BC)));
+}
+
+TEST(ObjectPathEquality, ABooleanIsTrueWhateverItsBits)
+{
+    CMPIData odd = boolean(true);
+    odd.value.boolean = 2;
+    EXPECT_TRUE(equalValues(odd, boolean(true)));
+}
+
+TEST(ObjectPathEquality, ValuesOfDifferentTypesAreDifferent)
+{
+    const std::vector<CMPIData> ones = {
+        boolean(true), unsignedInteger(CMPI_uint32, 1), real(CMPI_real64, 1), character(1)};
+    for (std::size_t a = 0; a < ones.size(); ++a)
+        for (std::size_t b = 0; b < a; ++b)
+            EXPECT_FALSE(equalValues(ones[a], ones[b])) << a << " and " << b;
+    FakePath number("root", sensorClass), text("root", sensorClass);
+    EXPECT_FALSE(equal(number.key("K", ones[1]), text.text("K", "1")));
+}
+
+TEST(ObjectPathEquality, PointsInTimeAreComparedByTheirStandardForm)
+{
+    const auto noon = "20261121120000.000000+000";
+    FakePath a("root", sensorClass), b("root", sensorClass), c("root", sensorClass);
+    a.dateTime("K", noon);
+    EXPECT_TRUE(equal(a, b.dateTime("K", noon)));
+    EXPECT_FALSE(equal(a, c.dateTime("K", "20261121120001.000000+000")));
+}
+
+TEST(ObjectPathEquality, NullAndHandlelessPathsEqualNothing)
+{
+    FakePath whole("root", sensorClass), broken("root", sensorClass);
+    broken.loseHandle();
+    EXPECT_FALSE(isObjPathsEqual(nullptr, nullptr, true));
+    EXPECT_FALSE(isObjPathsEqual(nullptr, whole.get(), true));
+    EXPECT_FALSE(isObjPathsEqual(whole.get(), nullptr, true));
+    EXPECT_FALSE(equal(whole, broken));
+    EXPECT_FALSE(equal(broken, broken));
+}
+
+TEST(ObjectPathEquality, KeysWithoutAValueCountAsNotThere)
+{
+    const std::vector<CMPIValueState> states = {
+        CMPI_nullValue, CMPI_notFound, CMPI_nullValue | CMPI_notFound};
+    for (const auto state : states) {
+        FakePath a("root", sensorClass), b("root", sensorClass), c("root", sensorClass);
+        a.text("DeviceID", "1");
+        b.text("DeviceID", "1").key("SystemName", poisoned(CMPI_string, state));
+        c.key("DeviceID", poisoned(CMPI_null, state));
+        EXPECT_TRUE(equal(a, b)) << state;
+        EXPECT_FALSE(equal(a, c)) << state;
+    }
+}
+
+TEST(ObjectPathEquality, KeysWithEmptyPointersCountAsNotThere)
+{
+    FakePath a("root", sensorClass), b("root", sensorClass);
+    a.text("DeviceID", "1");
+    b.text("DeviceID", "1").text("A", std::nullopt).chars("B", nullptr).reference("C", nullptr);
+    b.dateTime("D", std::nullopt);
+    CMPIData noString{};
+    noString.type = CMPI_string;
+    b.key("E", noString);
+    EXPECT_TRUE(equal(a, b));
+    EXPECT_FALSE(equal(a, FakePath("root", sensorClass).text("DeviceID", std::nullopt)));
+}
+
+TEST(ObjectPathEquality, BadValuesEqualNothing)
+{
+    const auto bad = poisoned(CMPI_string, CMPI_badValue);
+    EXPECT_FALSE(equalValues(bad, bad));
+    EXPECT_FALSE(equalValues(bad, boolean(true)));
+}
+
+TEST(ObjectPathEquality, TypesThatNoKeyCanHaveEqualNothing)
+{
+    for (const auto type :
+        std::vector<CMPIType>{CMPI_stringA, CMPI_instance, CMPI_null, CMPI_ptr}) {
+        const auto odd = poisoned(type, CMPI_goodValue);
+        EXPECT_FALSE(equalValues(odd, odd)) << type;
+    }
+}
+
+TEST(ObjectPathEquality, ABrokerThatFailsToListKeysMakesPathsUnequal)
+{
+    FakePath whole("root", sensorClass);
+    whole.text("A", "1").text("B", "2");
+    const auto unequalWhen = [&](auto breakPath) {
+        FakePath broken("root", sensorClass);
+        broken.text("A", "1").text("B", "2");
+        EXPECT_TRUE(equal(whole, broken));
+        breakPath(broken);
+        EXPECT_FALSE(equal(whole, broken));
+    };
+    unequalWhen([](FakePath& path) { path.countOutcome = CMPI_RC_ERR_FAILED; });
+    unequalWhen([](FakePath& path) { path.failingKey = 0; });
+    unequalWhen([](FakePath& path) { path.failingKey = 1; });
+    unequalWhen([](FakePath& path) { path.namelessKey = 1; });
+    unequalWhen([](FakePath& path) { path.keys[1].name.text.reset(); });
+    unequalWhen([](FakePath& path) { path.keys[1].name.outcome = CMPI_RC_ERR_FAILED; });
+}
+
+class References : public testing::Test {
+protected:
+    FakePath fan1{"root", sensorClass};
+    FakePath fan2{"root", sensorClass};
+    FakePath fan1Again{std::nullopt, "zumlo_numericsensor"};
+    FakePath a{"root", "ZUMLO_SensorSystemDevice"};
+    FakePath b{"root", "ZUMLO_SensorSystemDevice"};
+
+    References()
+    {
+        fan1.text("DeviceID", "fan1");
+        fan2.text("DeviceID", "fan2");
+        fan1Again.chars("deviceid", "fan1");
+    }
+};
+
+TEST_F(References, AreComparedAsPathsByTheSameRule)
+{
+    a.reference("PartComponent", fan1.get());
+    b.reference("partcomponent", fan1Again.get());
+    EXPECT_TRUE(equal(a, b, true));
+}
+
+TEST_F(References, ToDifferentPathsAreDifferent)
+{
+    a.reference("PartComponent", fan1.get());
+    b.reference("PartComponent", fan2.get());
+    EXPECT_FALSE(equal(a, b, true));
+}
+
+TEST_F(References, DoNotCountWhenTheyAreNotCompared)
+{
+    a.text("K", "1").reference("PartComponent", fan1.get());
+    b.text("K", "1").reference("PartComponent", fan2.get());
+    EXPECT_TRUE(equal(a, b, false));
+    FakePath none("root", "ZUMLO_SensorSystemDevice");
+    EXPECT_TRUE(equal(a, none.text("K", "1"), false));
+    EXPECT_FALSE(equal(a, none, true));
+}
+
+TEST_F(References, AreNotFollowedWhenTheyAreNotCompared)
+{
+    a.key("PartComponent", poisoned(CMPI_ref, CMPI_goodValue));
+    EXPECT_TRUE(equal(a, b, false));
+}
+
+TEST_F(References, AreNotTexts)
+{
+    a.reference("PartComponent", fan1.get());
+    b.text("PartComponent", "ZUMLO_NumericSensor.DeviceID=\"fan1\"");
+    EXPECT_FALSE(equal(a, b, true));
+}
+
+TEST_F(References, ToHandlelessPathsEqualNothing)
+{
+    fan1.loseHandle();
+    a.reference("PartComponent", fan1.get());
+    b.reference("PartComponent", fan1.get());
+    EXPECT_FALSE(equal(a, b, true));
+}
+
+// A chain of paths, each of which refers to the next.
+bool equalChains(int references)
+{
+    std::deque<FakePath> chain;
+    chain.emplace_back("root", "C");
+    for (int i = 0; i < references; ++i) {
+        CMPIObjectPath* const next = chain.back().get();
+        chain.emplace_back("root", "C").reference("Next", next);
+    }
+    return equal(chain.back(), chain.back(), true);
+}
+
+TEST_F(References, AreFollowedToABoundedDepth)
+{
+    EXPECT_TRUE(equalChains(8));
+    EXPECT_FALSE(equalChains(9));
+}
+
+TEST_F(References, InACircleComeToAnEnd)
+{
+    a.reference("Next", a.get());
+    EXPECT_FALSE(equal(a, a, true));
+}
+
+} // namespace
