@@ -1,0 +1,215 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "platform/instrumentation/Instrumentation.h"
+
+#include "platform/instrumentation/FailureLog.h"
+#include "platform/instrumentation/Source.h"
+#include "platform/instrumentation/SourceRegistry.h"
+#include "platform/instrumentation/Utf8.h"
+
+#include <cstdlib>
+#include <exception>
+#include <optional>
+#include <utility>
+
+namespace Vorn {
+
+using NodeLexicon::NodeType;
+using NodeLexicon::Properties;
+
+namespace {
+
+// What serves a process whose settings name no source.
+constexpr const char* defaultSources = "hwmon";
+
+std::string sourceListFromEnvironment()
+{
+    const char* value = secure_getenv("VORN_INSTRUMENTATION");
+    return value == nullptr || *value == '\0' ? defaultSources : value;
+}
+
+// Runs one step of using a source and keeps the record of what was reported up to date.
+template <typename Action>
+auto attempt(const std::string& entry, SourceStep step, const Action& action)
+{
+    try {
+        auto result = action();
+        FailureLog::instance().succeeded(entry, step);
+        return result;
+    } catch (const std::exception& error) {
+        FailureLog::instance().failed(entry, step, error.what());
+        throw;
+    }
+}
+
+std::optional<double> numberOf(const NodeReading& reading, Properties property)
+{
+    switch (property) {
+    case Properties::Reading:
+        return reading.reading;
+    case Properties::UpperCritical:
+        return reading.upperCritical;
+    case Properties::UpperNonCritical:
+        return reading.upperNonCritical;
+    case Properties::LowerCritical:
+        return reading.lowerCritical;
+    case Properties::LowerNonCritical:
+        return reading.lowerNonCritical;
+    case Properties::UpperFatal:
+        return reading.upperFatal;
+    case Properties::LowerFatal:
+        return reading.lowerFatal;
+    case Properties::BaseUnits:
+    case Properties::PossibleStates:
+        break;
+    }
+    return std::nullopt;
+}
+
+template <typename Value>
+bool store(const std::optional<Value>& from, Value& to)
+{
+    if (from)
+        to = *from;
+    return from.has_value();
+}
+
+} // namespace
+
+struct Instrumentation::State {
+    struct OpenSource {
+        std::string entry;
+        std::unique_ptr<Source> source;
+        std::vector<Node> nodes; // of the selected type
+    };
+
+    std::vector<OpenSource> sources;
+    NodeType type{};
+    std::size_t place = 0;              // the source of the node under the cursor
+    std::size_t index = 0;              // the node's place among those of its source
+    std::optional<NodeReading> reading; // of the node under the cursor, once it was asked
+
+    State();
+    void select(NodeType selected);
+    void advance();
+    void passFinishedSources();
+    bool standsOnNode() const { return place < sources.size(); }
+    const Node& node() const { return sources.at(place).nodes.at(index); }
+    const NodeReading& visit();
+};
+
+Instrumentation::State::State()
+{
+    const std::string list = sourceListFromEnvironment();
+    const auto entries =
+        attempt(list, {SourceStep::Stage::Configuring, {}}, [&] { return parseSourceList(list); });
+    for (const SourceEntry& entry : entries) {
+        auto source = attempt(
+            entry.text, {SourceStep::Stage::Opening, {}}, [&] { return openSource(entry); });
+        sources.push_back({entry.text, std::move(source), {}});
+    }
+    place = sources.size();
+}
+
+void Instrumentation::State::select(NodeType selected)
+{
+    place = sources.size(); // on nothing, should a source fail
+    reading.reset();
+    type = selected;
+    for (OpenSource& open : sources)
+        open.nodes = attempt(open.entry, {SourceStep::Stage::Listing, selected},
+            [&] { return open.source->nodes(selected); });
+    place = 0;
+    index = 0;
+    passFinishedSources();
+}
+
+void Instrumentation::State::advance()
+{
+    reading.reset();
+    ++index;
+    passFinishedSources();
+}
+
+void Instrumentation::State::passFinishedSources()
+{
+    for (; standsOnNode() && index >= sources[place].nodes.size(); ++place, index = 0)
+        // Only a walk to the end shows that every node can be read.
+        FailureLog::instance().succeeded(sources[place].entry, {SourceStep::Stage::Reading, type});
+}
+
+const NodeReading& Instrumentation::State::visit()
+{
+    if (reading)
+        return *reading;
+    const Node& visited = node();
+    OpenSource& open = sources[place];
+    try {
+        return reading.emplace(open.source->read(visited));
+    } catch (const std::exception& error) {
+        FailureLog::instance().failed(open.entry, {SourceStep::Stage::Reading, type}, error.what());
+        throw;
+    }
+}
+
+Instrumentation::Instrumentation() : state_(std::make_unique<State>()) {}
+
+Instrumentation::~Instrumentation() = default;
+
+void Instrumentation::selectNode(NodeType type)
+{
+    state_->select(type);
+}
+
+Instrumentation::operator bool() const noexcept
+{
+    return state_->standsOnNode();
+}
+
+Instrumentation& Instrumentation::operator++()
+{
+    state_->advance();
+    return *this;
+}
+
+std::string Instrumentation::getPathToNode() const
+{
+    return state_->node().path;
+}
+
+std::string Instrumentation::convertPathToString(const std::string& path) const
+{
+    return escapeControls(toValidUtf8(path));
+}
+
+std::string Instrumentation::getNodeDescription() const
+{
+    return state_->node().description;
+}
+
+unsigned Instrumentation::getSensorType() const
+{
+    return state_->node().sensorType;
+}
+
+unsigned Instrumentation::getNodeStatus()
+{
+    return state_->visit().status;
+}
+
+bool Instrumentation::getProperty(Properties property, double& value)
+{
+    return store(numberOf(state_->visit(), property), value);
+}
+
+bool Instrumentation::getProperty(Properties property, unsigned& value)
+{
+    return property == Properties::BaseUnits && store(state_->visit().baseUnits, value);
+}
+
+bool Instrumentation::getProperty(Properties property, std::vector<unsigned>& value)
+{
+    return property == Properties::PossibleStates && store(state_->visit().possibleStates, value);
+}
+
+} // namespace Vorn

@@ -1,0 +1,107 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "platform/instrumentation/RegularFile.h"
+
+#include <algorithm>
+#include <array>
+#include <cerrno>
+#include <chrono>
+#include <stdexcept>
+#include <system_error>
+
+#include <fcntl.h>
+#include <unistd.h>
+
+namespace Vorn {
+
+namespace {
+
+[[noreturn]] void failWithErrno()
+{
+    throw std::runtime_error(std::generic_category().message(errno));
+}
+
+class Descriptor {
+public:
+    explicit Descriptor(const std::string& path)
+        : number_(open(path.c_str(), O_RDONLY | O_CLOEXEC | O_NOCTTY | O_NONBLOCK))
+    {
+        if (number_ < 0)
+            failWithErrno();
+    }
+    ~Descriptor() { close(number_); }
+    Descriptor(const Descriptor&) = delete;
+    Descriptor& operator=(const Descriptor&) = delete;
+
+    int number() const { return number_; }
+
+private:
+    int number_;
+};
+
+FileStamp stampOfRegular(const struct stat& status)
+{
+    if (S_ISDIR(status.st_mode))
+        throw std::runtime_error(std::generic_category().message(EISDIR));
+    if (!S_ISREG(status.st_mode))
+        throw std::runtime_error("Not a regular file");
+    return stampOf(status);
+}
+
+[[noreturn]] void failTooLarge(std::size_t limit)
+{
+    throw std::runtime_error("Larger than " + std::to_string(limit) + " bytes");
+}
+
+// Up to the end of the file, which may have grown since its size was asked.
+std::string readToEnd(const Descriptor& file, std::size_t expected, std::size_t limit)
+{
+    std::string text;
+    text.reserve(expected);
+    std::array<char, 65536> block;
+    for (;;) {
+        const ssize_t count = read(file.number(), block.data(), block.size());
+        if (count == 0)
+            return text;
+        if (count < 0 && errno == EINTR)
+            continue;
+        if (count < 0)
+            failWithErrno();
+        text.append(block.data(), static_cast<std::size_t>(count));
+        if (text.size() > limit)
+            failTooLarge(limit);
+    }
+}
+
+} // namespace
+
+FileStamp stampOfRegularFile(const std::string& path)
+{
+    struct stat status {};
+    if (stat(path.c_str(), &status) != 0)
+        failWithErrno();
+    return stampOfRegular(status);
+}
+
+FileContent readRegularFile(const std::string& path, std::size_t limit)
+{
+    stampOfRegularFile(path); // opening a device can have effects of its own
+    const Descriptor file(path);
+    struct stat status {};
+    if (fstat(file.number(), &status) != 0)
+        failWithErrno();
+    const FileStamp stamp = stampOfRegular(status);
+    const auto size = static_cast<std::size_t>(stamp.size);
+    if (size > limit)
+        failTooLarge(limit);
+    return {readToEnd(file, size, limit), stamp};
+}
+
+bool isSettled(const FileStamp& stamp)
+{
+    constexpr auto tick = std::chrono::milliseconds(50);
+    const auto now = std::chrono::system_clock::now().time_since_epoch();
+    return now - std::chrono::nanoseconds(std::max(stamp.changed, stamp.modified)) > tick;
+}
+
+} // namespace Vorn

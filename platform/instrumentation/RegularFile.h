@@ -1,0 +1,28 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// Reads regular files and nothing else: a pipe or a device could block or be disturbed.
+
+#pragma once
+
+#include "platform/instrumentation/FileStamp.h"
+
+#include <cstddef>
+#include <string>
+
+namespace Vorn {
+
+struct FileContent {
+    std::string text;
+    FileStamp stamp; // taken before the text was read
+};
+
+// Throw std::runtime_error with the reason alone: the system's own text, what else the path
+// names, or that the file is larger than the limit.
+FileStamp stampOfRegularFile(const std::string& path);
+FileContent readRegularFile(const std::string& path, std::size_t limit);
+
+// Whether the file is sure to get another stamp when it is written again. One that changed
+// a moment ago might not: the kernel's file times move in ticks of some milliseconds.
+bool isSettled(const FileStamp& stamp);
+
+} // namespace Vorn

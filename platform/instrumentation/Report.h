@@ -1,0 +1,25 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// Message lines of this room on the log channel.
+
+#pragma once
+
+#include "platform/logging/RynLogger.h"
+
+#include <string>
+
+namespace Vorn {
+
+constexpr int messageLevel = 6000;
+
+// `module` is the name of the calling file without folder and extension. The defaults are
+// those of the place that calls.
+inline void report(const char* module, const std::string& text,
+    const char* function = __builtin_FUNCTION(),
+    unsigned line = static_cast<unsigned>(__builtin_LINE())) noexcept
+{
+    RynLog::RynLogger::logLevelMessage(
+        function, module, line, "Nimbrel.Instrumentation", messageLevel, nullptr, 0, 0, text);
+}
+
+} // namespace Vorn

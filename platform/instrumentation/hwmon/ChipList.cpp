@@ -1,0 +1,109 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "platform/instrumentation/hwmon/ChipList.h"
+
+#include "platform/instrumentation/Report.h"
+#include "platform/instrumentation/hwmon/Machine.h"
+
+#include <sensors/error.h>
+#include <sensors/sensors.h>
+
+#include <algorithm>
+#include <cstdio>
+#include <memory>
+#include <mutex>
+#include <new>
+#include <stdexcept>
+#include <utility>
+
+namespace Vorn::Hwmon {
+
+ChipList& ChipList::instance()
+{
+    static ChipList list;
+    return list;
+}
+
+ChipList::~ChipList()
+{
+    const std::unique_lock alone(mutex_);
+    sensors_cleanup();
+}
+
+ChipList::Lock ChipList::lockKnown()
+{
+    return Lock(mutex_);
+}
+
+ChipList::Lock ChipList::lockPresent()
+{
+    for (;;) {
+        const std::string present = machineFingerprint();
+        Lock shared(mutex_);
+        if (fingerprint_ == present)
+            return shared;
+        shared.unlock();
+        {
+            const std::unique_lock alone(mutex_);
+            if (fingerprint_ != present)
+                renew();
+        }
+        shared.lock();
+        // Empty when another thread's renewal has failed in between; then this one tries.
+        if (!fingerprint_.empty())
+            return shared;
+    }
+}
+
+// REQUIRES: the list is locked for this thread alone.
+void ChipList::renew()
+{
+    // libsensors gives up when a chip goes away while it is looking; soon after, it will not.
+    constexpr int mostAttempts = 5;
+    for (int attempt = 1; true; ++attempt) {
+        fingerprint_.clear();
+        sensors_cleanup();
+        // Taken before libsensors looks, so that a chip which comes meanwhile shows next time.
+        const std::string present = machineFingerprint();
+        try {
+            if (hasHwmon())
+                initialise(Configuration());
+            fingerprint_ = present;
+            return;
+        } catch (const std::runtime_error&) {
+            if (attempt == mostAttempts)
+                throw;
+        }
+    }
+}
+
+void ChipList::initialise(const Configuration& configuration)
+{
+    std::string text = configuration.text();
+    const std::unique_ptr<FILE, decltype(&fclose)> file(
+        fmemopen(text.data(), text.size(), "r"), &fclose);
+    if (file == nullptr)
+        throw std::bad_alloc();
+    const LibsensorsHooks::ParseErrors errors;
+    const int result = sensors_init(file.get());
+    reportOnce(errors.list(), configuration);
+    if (result != 0)
+        throw std::runtime_error(
+            std::string("libsensors cannot list the chips: ") + sensors_strerror(result));
+}
+
+// Chips come and go while the configuration stays: what was wrong before is not said again.
+void ChipList::reportOnce(
+    const std::vector<LibsensorsHooks::ParseError>& errors, const Configuration& configuration)
+{
+    std::vector<std::string> texts;
+    for (const LibsensorsHooks::ParseError& error : errors) {
+        const std::string& text =
+            texts.emplace_back(configuration.place(error.line) + ": " + error.text);
+        if (std::find(reported_.begin(), reported_.end(), text) == reported_.end())
+            report("ChipList", text);
+    }
+    reported_ = std::move(texts);
+}
+
+} // namespace Vorn::Hwmon

@@ -1,0 +1,42 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// The administrator's sensors configuration, see sensors.conf(5).
+
+#pragma once
+
+#include <filesystem>
+#include <string>
+#include <vector>
+
+namespace Vorn::Hwmon {
+
+// The files that libsensors reads when it is not told which, in its order.
+std::vector<std::filesystem::path> configurationFiles();
+
+// All of them as one text. Left to itself, the parser of libsensors 3.6.0 keeps a pointer to the
+// last `chip` statement through sensors_cleanup(); a statement that comes before the first valid
+// `chip` statement is then written to freed memory. The text begins with one of its own, which
+// names no chip there is, so that this cannot happen.
+class Configuration {
+public:
+    // Throws std::runtime_error naming the file that cannot be read.
+    Configuration();
+
+    const std::string& text() const { return text_; }
+
+    // Where a line of the text, counted from 1, comes from, such as "/etc/sensors3.conf:12".
+    std::string place(int line) const;
+
+private:
+    struct Part {
+        std::string file;
+        int firstLine; // in the text
+    };
+
+    void append(const std::filesystem::path& file);
+
+    std::string text_;
+    std::vector<Part> parts_;
+};
+
+} // namespace Vorn::Hwmon

@@ -1,0 +1,58 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "platform/instrumentation/hwmon/LibsensorsHooks.h"
+
+#include <sensors/error.h>
+
+#include <atomic>
+#include <new>
+
+namespace Vorn::Hwmon {
+
+namespace {
+
+// A configuration without end must not fill the memory or the log.
+constexpr std::size_t mostParseErrors = 20;
+
+std::atomic<std::vector<LibsensorsHooks::ParseError>*> collected{nullptr};
+
+void collectParseError(const char* error, const char*, int line)
+{
+    if (auto* list = collected.load(); list != nullptr && list->size() < mostParseErrors)
+        list->push_back({error, line});
+}
+
+[[noreturn]] void throwFatalError(const char*, const char*)
+{
+    throw std::bad_alloc();
+}
+
+} // namespace
+
+LibsensorsHooks::LibsensorsHooks()
+    : parseError_(sensors_parse_error_wfn), fatalError_(sensors_fatal_error)
+{
+    sensors_parse_error_wfn = collectParseError;
+    sensors_fatal_error = throwFatalError;
+}
+
+LibsensorsHooks::~LibsensorsHooks()
+{
+    // Somebody who set hooks of their own since then keeps them.
+    if (sensors_parse_error_wfn == collectParseError)
+        sensors_parse_error_wfn = parseError_;
+    if (sensors_fatal_error == throwFatalError)
+        sensors_fatal_error = fatalError_;
+}
+
+LibsensorsHooks::ParseErrors::ParseErrors()
+{
+    collected = &list_;
+}
+
+LibsensorsHooks::ParseErrors::~ParseErrors()
+{
+    collected = nullptr;
+}
+
+} // namespace Vorn::Hwmon

@@ -1,0 +1,92 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "platform/instrumentation/hwmon/Status.h"
+
+namespace Vorn::Hwmon {
+
+namespace {
+
+// Node status codes of the hardware model.
+constexpr unsigned normal = 1;
+constexpr unsigned lostCommunication = 13;
+constexpr unsigned disabled = 16;
+constexpr unsigned warning = 21;
+constexpr unsigned warningLow = 22;
+constexpr unsigned warningHigh = 23;
+constexpr unsigned criticalLow = 25;
+constexpr unsigned criticalHigh = 26;
+
+bool isUnset(const std::optional<double>& limit)
+{
+    return limit.value_or(0.0) == 0.0;
+}
+
+bool isRaised(const std::optional<bool>& alarm)
+{
+    return alarm.value_or(false);
+}
+
+bool isAtOrAbove(double reading, const std::optional<double>& limit)
+{
+    return limit && reading >= *limit;
+}
+
+bool isAtOrBelow(double reading, const std::optional<double>& limit)
+{
+    return limit && reading <= *limit;
+}
+
+} // namespace
+
+Limits withoutUnset(const Limits& limits)
+{
+    Limits set = limits;
+    if (isUnset(limits.min) && isUnset(limits.max))
+        set.min = set.max = std::nullopt;
+    if (isUnset(limits.lcrit) && isUnset(limits.crit))
+        set.lcrit = set.crit = std::nullopt;
+    if (isUnset(limits.emergency))
+        set.emergency = std::nullopt;
+    return set;
+}
+
+unsigned statusOf(const Channel& channel)
+{
+    if (channel.hasFault || !channel.reading)
+        return lostCommunication;
+    if (!channel.isEnabled.value_or(true))
+        return disabled;
+    const double reading = *channel.reading;
+    const Limits& limits = channel.limits;
+    const Alarms& alarms = channel.alarms;
+    if (isRaised(alarms.emergency) || isRaised(alarms.crit) || isAtOrAbove(reading, limits.crit))
+        return criticalHigh;
+    if (isRaised(alarms.lcrit) || isAtOrBelow(reading, limits.lcrit))
+        return criticalLow;
+    if (isRaised(alarms.max) || isAtOrAbove(reading, limits.max))
+        return warningHigh;
+    // A fan with a plain alarm that is at or below its minimum is among these.
+    if (isRaised(alarms.min) || isAtOrBelow(reading, limits.min))
+        return warningLow;
+    return isRaised(alarms.plain) ? warning : normal;
+}
+
+std::vector<unsigned> possibleStatesOf(const Channel& channel)
+{
+    const Limits& limits = channel.limits;
+    const Alarms& alarms = channel.alarms;
+    std::vector<unsigned> states{normal};
+    const auto addIf = [&](bool canHappen, unsigned state) {
+        if (canHappen)
+            states.push_back(state);
+    };
+    addIf(channel.isEnabled.has_value(), disabled);
+    addIf(alarms.plain.has_value(), warning);
+    addIf(limits.min || alarms.min, warningLow);
+    addIf(limits.max || alarms.max, warningHigh);
+    addIf(limits.lcrit || alarms.lcrit, criticalLow);
+    addIf(limits.crit || alarms.crit || alarms.emergency, criticalHigh);
+    return states;
+}
+
+} // namespace Vorn::Hwmon

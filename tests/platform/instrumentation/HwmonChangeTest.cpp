@@ -1,0 +1,184 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// Chips that come and go, and a configuration that changes, while somebody is reading.
+
+#include "platform/instrumentation/Recorder.h"
+#include "platform/instrumentation/hwmon/HwmonSource.h"
+#include "platform/instrumentation/model/ModelReader.h"
+#include "tests/platform/instrumentation/HwmonMachine.h"
+
+#include <gmock/gmock.h>
+
+#include <atomic>
+#include <chrono>
+#include <thread>
+
+namespace {
+
+using Testing::Attributes;
+using Testing::BoundSysfs;
+using testing::ElementsAre;
+using Testing::HwmonTest;
+using testing::IsEmpty;
+using Testing::OneChip;
+using testing::SizeIs;
+using Testing::testchip;
+using Testing::walk;
+using Vorn::NodeLexicon::NodeType;
+
+using HwmonChange = HwmonTest;
+
+constexpr const char* nvme = "hwmon/hwmon1";
+
+std::vector<std::string> paths()
+{
+    std::vector<std::string> found;
+    for (const Testing::SeenNode& node : walk())
+        found.push_back(node.path);
+    return found;
+}
+
+TEST_F(HwmonChange, aChipThatVanishedOrCameBackShowsAtTheNextRequest)
+{
+    BoundSysfs sysfs(Testing::sysfsTree("hotplug"));
+    const auto before = paths();
+    EXPECT_THAT(before, ElementsAre("/hwmon/coretemp-isa-0000/temp1",
+                            "/hwmon/drivetemp-scsi-2-0/temp1", "/hwmon/nvme-pci-0200/temp1"));
+    sysfs.rename(nvme, "unplugged");
+    EXPECT_THAT(
+        paths(), ElementsAre("/hwmon/coretemp-isa-0000/temp1", "/hwmon/drivetemp-scsi-2-0/temp1"));
+    sysfs.rename("unplugged", "hwmon/hwmon9");
+    EXPECT_EQ(paths(), before);
+}
+
+TEST_F(HwmonChange, aChipThatTookAnothersPlaceIsTakenForWhatItIs)
+{
+    BoundSysfs sysfs(Testing::sysfsTree("hotplug"));
+    walk();
+    sysfs.write(std::string(nvme) + "/name", "other\n");
+    EXPECT_THAT(paths(), testing::Contains("/hwmon/other-pci-0200/temp1"));
+}
+
+TEST_F(HwmonChange, anAttributeThatADriverAddsShowsAtTheNextRequest)
+{
+    OneChip chip(Attributes{{"temp1_input", "20000"}});
+    EXPECT_THAT(walk(), SizeIs(1));
+    chip.set("temp2_input", "21000");
+    EXPECT_THAT(walk(), SizeIs(2));
+}
+
+TEST_F(HwmonChange, aListedNodeWhoseChipVanishedIsLost)
+{
+    BoundSysfs sysfs(Testing::sysfsTree("hotplug"));
+    Vorn::HwmonSource source;
+    const auto nodes = source.nodes(NodeType::Temperature);
+    ASSERT_THAT(nodes, SizeIs(3));
+    EXPECT_EQ(source.read(nodes[2]).reading, 35.85);
+    sysfs.remove(nvme);
+    EXPECT_EQ(source.read(nodes[2]).status, 13U);
+    EXPECT_FALSE(source.read(nodes[2]).reading);
+    walk(); // the list is made anew, without the chip
+    EXPECT_EQ(source.read(nodes[2]), Vorn::NodeReading{.status = 13});
+    EXPECT_EQ(source.read(nodes[0]).reading, 44.0);
+}
+
+TEST_F(HwmonChange, aListedNodeOutlivesChangesElsewhere)
+{
+    BoundSysfs sysfs(Testing::sysfsTree("hotplug"));
+    Vorn::HwmonSource source;
+    const auto nodes = source.nodes(NodeType::Temperature);
+    sysfs.remove("hwmon/hwmon0");
+    sysfs.addChip("hwmon12", "newcomer", "platform", "newcomer.1");
+    walk();
+    EXPECT_EQ(source.read(nodes.at(2)).reading, 35.85);
+}
+
+TEST_F(HwmonChange, nodesOfEarlierListingsCanBeRead)
+{
+    const BoundSysfs sysfs(Testing::sysfsTree("server"));
+    Vorn::HwmonSource source;
+    const auto temperatures = source.nodes(NodeType::Temperature);
+    const auto fans = source.nodes(NodeType::Tachometer);
+    EXPECT_EQ(source.read(temperatures.at(0)).baseUnits, 2U);
+    EXPECT_EQ(source.read(fans.at(0)).baseUnits, 19U);
+}
+
+TEST_F(HwmonChange, aChangedConfigurationHoldsAtTheNextRequest)
+{
+    const OneChip chip(Attributes{{"temp1_input", "20000"}});
+    EXPECT_EQ(walk().at(0).description, "temp1");
+    configuration().write("chip \"*-*\"\n  label temp1 \"Board\"\n");
+    EXPECT_EQ(walk().at(0).description, "Board");
+    configuration().write("chip \"*-*\"\n  ignore temp1\n");
+    EXPECT_THAT(walk(), IsEmpty());
+}
+
+TEST_F(HwmonChange, twoCursorsOnOneThreadDoNotBlockEachOther)
+{
+    BoundSysfs sysfs(Testing::sysfsTree("hotplug"));
+    Vorn::Instrumentation first;
+    first.selectNode(NodeType::Temperature);
+    sysfs.remove(nvme);
+    Vorn::Instrumentation second;
+    second.selectNode(NodeType::Temperature);
+    EXPECT_EQ(first.getNodeStatus(), 1U);
+    EXPECT_EQ(second.getNodeStatus(), 1U);
+}
+
+TEST_F(HwmonChange, aRecordedMachineReplaysToTheSameNodes)
+{
+    for (const std::string tree : {"desktop", "server", "hotplug"}) {
+        const BoundSysfs sysfs(Testing::sysfsTree(tree));
+        const auto nodes = walk();
+        const auto recorded = Vorn::readModel(Vorn::recordModel());
+        ASSERT_EQ(recorded.size(), nodes.size());
+        for (std::size_t at = 0; at < nodes.size(); ++at) {
+            EXPECT_EQ(recorded[at].path, nodes[at].path);
+            EXPECT_EQ(recorded[at].description, nodes[at].description);
+            EXPECT_EQ(recorded[at].type, nodes[at].type);
+            EXPECT_EQ(recorded[at].sensorType, nodes[at].sensorType);
+            EXPECT_EQ(recorded[at].values, nodes[at].values);
+        }
+    }
+}
+
+// What the tree says; a lost node shows no reading.
+std::optional<double> expectedReading(const Testing::SeenNode& node)
+{
+    static const std::map<std::string, double> readings{{"/hwmon/coretemp-isa-0000/temp1", 44.0},
+        {"/hwmon/drivetemp-scsi-2-0/temp1", 31.0}, {"/hwmon/nvme-pci-0200/temp1", 35.85}};
+    if (node.values.status == 13)
+        return std::nullopt;
+    return readings.at(node.path);
+}
+
+TEST_F(HwmonChange, eightThreadsReadWhileChipsComeAndGo)
+{
+    BoundSysfs sysfs(Testing::sysfsTree("hotplug"));
+    std::atomic<bool> goOn{true};
+    std::atomic<unsigned> walks{0};
+    std::vector<std::jthread> readers;
+    for (int reader = 0; reader < 8; ++reader)
+        readers.emplace_back([&] {
+            while (goOn) {
+                const auto nodes = walk();
+                EXPECT_GE(nodes.size(), 2U);
+                for (const Testing::SeenNode& node : nodes)
+                    EXPECT_EQ(node.values.reading, expectedReading(node)) << node.path;
+                ++walks;
+            }
+        });
+    const auto end = std::chrono::steady_clock::now() + std::chrono::seconds(3);
+    while (std::chrono::steady_clock::now() < end) {
+        sysfs.rename(nvme, "unplugged");
+        std::this_thread::sleep_for(std::chrono::milliseconds(5));
+        sysfs.rename("unplugged", nvme);
+        std::this_thread::sleep_for(std::chrono::milliseconds(5));
+    }
+    goOn = false;
+    readers.clear();
+    EXPECT_GT(walks, 8U);
+    EXPECT_THAT(walk(), SizeIs(3));
+}
+
+} // namespace

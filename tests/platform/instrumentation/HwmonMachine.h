@@ -1,0 +1,68 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// Machines whose sysfs a test writes down.
+
+#pragma once
+
+#include "tests/platform/instrumentation/Walk.h"
+#include "tests/support/Environment.h"
+#include "tests/support/MountNamespace.h"
+
+#include <filesystem>
+#include <map>
+#include <optional>
+#include <string>
+
+namespace Testing {
+
+// Every test sees the kernel's sensors only, with a sensors configuration that says nothing.
+class HwmonTest : public MountNamespaceTest {
+protected:
+    void SetUp() override
+    {
+        MountNamespaceTest::SetUp();
+        if (!IsSkipped() && !HasFatalFailure())
+            configuration_.emplace("");
+    }
+
+    BoundSensorsConfiguration& configuration() { return *configuration_; }
+
+private:
+    EnvironmentVariable environment_{"VORN_INSTRUMENTATION", "hwmon"};
+    std::optional<BoundSensorsConfiguration> configuration_;
+};
+
+inline std::filesystem::path sysfsTree(const std::string& name)
+{
+    return std::filesystem::path(SENSOR_PROFILE_SOURCE_DIR) / "tests/data/sysfs" / name;
+}
+
+using Attributes = std::map<std::string, std::string>;
+
+// A machine with one chip, "testchip-isa-0290", that has these attributes.
+class OneChip {
+public:
+    explicit OneChip(const Attributes& attributes) : sysfs_("")
+    {
+        sysfs_.addChip("hwmon0", "testchip", "platform", "testchip.656");
+        for (const auto& [name, text] : attributes)
+            set(name, text);
+    }
+
+    void set(const std::string& attribute, const std::string& text)
+    {
+        sysfs_.write("hwmon/hwmon0/" + attribute, text + "\n");
+    }
+
+    BoundSysfs& sysfs() { return sysfs_; }
+
+private:
+    BoundSysfs sysfs_;
+};
+
+inline std::string testchip(const std::string& feature)
+{
+    return "/hwmon/testchip-isa-0290/" + feature;
+}
+
+} // namespace Testing

@@ -1,0 +1,354 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// The hwmon source over attributes that a test writes down.
+
+#include "platform/instrumentation/hwmon/HwmonSource.h"
+#include "tests/platform/instrumentation/HwmonMachine.h"
+#include "tests/support/LogCapture.h"
+
+#include <gmock/gmock.h>
+
+#include <sensors/error.h>
+
+#include <new>
+
+namespace {
+
+using Testing::Attributes;
+using Testing::BoundSysfs;
+using testing::ElementsAre;
+using testing::HasSubstr;
+using Testing::HwmonTest;
+using testing::IsEmpty;
+using Testing::nodeAt;
+using Testing::OneChip;
+using Testing::SeenNode;
+using testing::SizeIs;
+using Testing::testchip;
+using Testing::walk;
+using Vorn::NodeLexicon::NodeType;
+
+using Hwmon = HwmonTest;
+
+SeenNode only(const std::vector<SeenNode>& nodes)
+{
+    if (nodes.size() != 1)
+        throw std::logic_error("there are " + std::to_string(nodes.size()) + " nodes");
+    return nodes.front();
+}
+
+// The one node of a chip with these attributes.
+SeenNode nodeOf(const Attributes& attributes)
+{
+    const OneChip chip(attributes);
+    return only(walk());
+}
+
+TEST_F(Hwmon, aMachineWithoutTheHwmonClassHasNoSensors)
+{
+    BoundSysfs sysfs("");
+    sysfs.remove("hwmon");
+    EXPECT_THAT(walk(), IsEmpty());
+}
+
+TEST_F(Hwmon, aMachineWithoutChipsHasNoSensors)
+{
+    const BoundSysfs sysfs("");
+    EXPECT_THAT(walk(), IsEmpty());
+}
+
+TEST_F(Hwmon, eachKindHasItsTypeItsUnitsAndItsScale)
+{
+    const OneChip chip({{"temp1_input", "41500"}, {"in0_input", "1024"}, {"fan1_input", "900"},
+        {"power1_input", "1"}, {"curr1_input", "1"}, {"humidity1_input", "1"}});
+    const auto nodes = walk();
+    ASSERT_THAT(nodes, SizeIs(3));
+    const auto& temperature = nodeAt(nodes, testchip("temp1"));
+    EXPECT_EQ(temperature.type, NodeType::Temperature);
+    EXPECT_EQ(temperature.sensorType, 22U);
+    EXPECT_EQ(temperature.values.baseUnits, 2U);
+    EXPECT_EQ(temperature.values.reading, 41.5);
+    const auto& voltage = nodeAt(nodes, testchip("in0"));
+    EXPECT_EQ(voltage.type, NodeType::Voltage);
+    EXPECT_EQ(voltage.sensorType, 21U);
+    EXPECT_EQ(voltage.values.baseUnits, 5U);
+    EXPECT_EQ(voltage.values.reading, 1.024);
+    const auto& fan = nodeAt(nodes, testchip("fan1"));
+    EXPECT_EQ(fan.type, NodeType::Tachometer);
+    EXPECT_EQ(fan.sensorType, 20U);
+    EXPECT_EQ(fan.values.baseUnits, 19U);
+    EXPECT_EQ(fan.values.reading, 900.0);
+}
+
+TEST_F(Hwmon, everyLimitBecomesItsThreshold)
+{
+    const SeenNode node = nodeOf({{"temp1_input", "50000"}, {"temp1_min", "5000"},
+        {"temp1_max", "80000"}, {"temp1_lcrit", "-10000"}, {"temp1_crit", "95000"},
+        {"temp1_emergency", "105000"}, {"temp1_max_hyst", "75000"}, {"temp1_highest", "60000"}});
+    EXPECT_EQ(node.values, (Vorn::NodeReading{.status = 1,
+                               .reading = 50,
+                               .lowerNonCritical = 5,
+                               .upperNonCritical = 80,
+                               .lowerCritical = -10,
+                               .upperCritical = 95,
+                               .upperFatal = 105,
+                               .baseUnits = 2,
+                               .possibleStates = {{1, 22, 23, 25, 26}}}));
+}
+
+TEST_F(Hwmon, theAverageStandsInWhereThereIsNoInput)
+{
+    EXPECT_EQ(nodeOf({{"in1_average", "3300"}}).values.reading, 3.3);
+    EXPECT_EQ(nodeOf({{"in1_average", "3300"}, {"in1_input", "5000"}}).values.reading, 5.0);
+    EXPECT_EQ(
+        nodeOf({{"in1_average", "3300"}, {"in1_input", "none"}}).values.reading, std::nullopt);
+}
+
+struct Row {
+    std::string name;
+    Attributes attributes;
+    unsigned status;
+};
+
+class HwmonStatus : public HwmonTest, public testing::WithParamInterface<Row> {};
+
+TEST_P(HwmonStatus, followsFromTheAttributes)
+{
+    EXPECT_EQ(nodeOf(GetParam().attributes).values.status, GetParam().status);
+}
+
+const Row rows[] = {
+    {"normal", {{"temp1_input", "50000"}}, 1},
+    {"temperatureFault", {{"temp1_input", "50000"}, {"temp1_fault", "1"}}, 13},
+    {"fanFault", {{"fan1_input", "0"}, {"fan1_fault", "1"}}, 13},
+    {"noFault", {{"temp1_input", "50000"}, {"temp1_fault", "0"}}, 1},
+    {"unreadable", {{"temp1_input", "N/A"}, {"temp1_crit", "90000"}}, 13},
+    {"notANumber", {{"temp1_input", "nan"}}, 13},
+    {"noInputAtAll", {{"temp1_crit", "90000"}}, 13},
+    {"disabled", {{"temp1_input", "50000"}, {"temp1_enable", "0"}}, 16},
+    {"enabled", {{"temp1_input", "50000"}, {"temp1_enable", "1"}}, 1},
+    {"disabledVoltage", {{"in3_input", "0"}, {"in3_enable", "0"}}, 16},
+    {"disabledFan", {{"fan2_input", "0"}, {"fan2_enable", "0"}}, 16},
+    {"unreadableBeforeDisabled", {{"temp1_input", "N/A"}, {"temp1_enable", "0"}}, 13},
+    {"emergencyAlarm", {{"temp1_input", "50000"}, {"temp1_emergency_alarm", "1"}}, 26},
+    {"critAlarm", {{"temp1_input", "50000"}, {"temp1_crit_alarm", "1"}}, 26},
+    {"voltageCritAlarm", {{"in0_input", "1000"}, {"in0_crit_alarm", "1"}}, 26},
+    {"atCrit", {{"temp1_input", "95000"}, {"temp1_crit", "95000"}}, 26},
+    {"lcritAlarm", {{"temp1_input", "50000"}, {"temp1_lcrit_alarm", "1"}}, 25},
+    {"voltageLcritAlarm", {{"in0_input", "1000"}, {"in0_lcrit_alarm", "1"}}, 25},
+    {"atLcrit", {{"in0_input", "1000"}, {"in0_lcrit", "1000"}, {"in0_crit", "2000"}}, 25},
+    {"maxAlarm", {{"temp1_input", "50000"}, {"temp1_max_alarm", "1"}}, 23},
+    {"fanMaxAlarm", {{"fan1_input", "900"}, {"fan1_max_alarm", "1"}}, 23},
+    {"atMax", {{"in0_input", "2000"}, {"in0_max", "2000"}}, 23},
+    {"minAlarm", {{"temp1_input", "50000"}, {"temp1_min_alarm", "1"}}, 22},
+    {"voltageMinAlarm", {{"in0_input", "1000"}, {"in0_min_alarm", "1"}}, 22},
+    {"atMin", {{"fan1_input", "600"}, {"fan1_min", "600"}}, 22},
+    {"plainAlarm", {{"temp1_input", "50000"}, {"temp1_alarm", "1"}}, 21},
+    {"plainAlarmOfVoltage", {{"in0_input", "1000"}, {"in0_alarm", "1"}}, 21},
+    {"plainAlarmOfAFanBelowItsMinimum",
+        {{"fan1_input", "500"}, {"fan1_min", "600"}, {"fan1_alarm", "1"}}, 22},
+    {"plainAlarmOfAFanAboveItsMinimum",
+        {{"fan1_input", "700"}, {"fan1_min", "600"}, {"fan1_alarm", "1"}}, 21},
+    {"anAlarmThatCannotBeReadIsNotRaised", {{"temp1_input", "50000"}, {"temp1_crit_alarm", "N/A"}},
+        1},
+    {"limitsThatNobodySetAreNotReached",
+        {{"in1_input", "1000"}, {"in1_min", "0"}, {"in1_max", "0"}, {"in1_lcrit", "0"},
+            {"in1_crit", "0"}},
+        1},
+    {"aFanWhoseMinimumNobodySetMayStandStill", {{"fan1_input", "0"}, {"fan1_min", "0"}}, 1},
+};
+
+INSTANTIATE_TEST_SUITE_P(
+    EveryRow, HwmonStatus, testing::ValuesIn(rows), [](const auto& row) { return row.param.name; });
+
+TEST_F(Hwmon, limitsThatNobodySetAreAbsent)
+{
+    const auto values = nodeOf(
+        {{"in1_input", "1000"}, {"in1_min", "0"}, {"in1_max", "0"}, {"in1_lcrit", "0"},
+            {"in1_crit",
+                "0"}}).values;
+    EXPECT_FALSE(values.lowerNonCritical || values.upperNonCritical);
+    EXPECT_FALSE(values.lowerCritical || values.upperCritical);
+    EXPECT_THAT(*values.possibleStates, ElementsAre(1));
+}
+
+TEST_F(Hwmon, aLimitThatCannotBeReadIsAbsent)
+{
+    const auto values =
+        nodeOf({{"temp1_input", "50000"}, {"temp1_max", "N/A"}, {"temp1_crit", "90000"}}).values;
+    EXPECT_FALSE(values.upperNonCritical);
+    EXPECT_EQ(values.upperCritical, 90.0);
+}
+
+TEST_F(Hwmon, aChannelWithAFaultShowsItsLimitsButNoReading)
+{
+    const auto values =
+        nodeOf({{"temp1_input", "-128000"}, {"temp1_fault", "1"}, {"temp1_max", "80000"}}).values;
+    EXPECT_FALSE(values.reading);
+    EXPECT_EQ(values.upperNonCritical, 80.0);
+}
+
+// libsensors opens the attribute at every reading. These are the ways in which that can fail
+// without a driver's help: it says "Kernel interface error" where the file cannot be opened, and
+// "Can't read" where it holds no number or reading it fails.
+TEST_F(Hwmon, anAttributeThatCannotBeReadNowIsLostNow)
+{
+    OneChip chip(Attributes{{"temp1_input", "50000"}});
+    Vorn::HwmonSource source;
+    const Vorn::Node node = source.nodes(NodeType::Temperature).at(0);
+    const auto attribute = chip.sysfs().path("hwmon/hwmon0/temp1_input");
+    std::filesystem::remove(attribute);
+    EXPECT_EQ(source.read(node).status, 13U);
+    std::filesystem::create_symlink("nowhere", attribute);
+    EXPECT_EQ(source.read(node).status, 13U);
+    std::filesystem::remove(attribute);
+    std::filesystem::create_directory(attribute);
+    EXPECT_EQ(source.read(node).status, 13U);
+    std::filesystem::remove(attribute);
+    chip.set("temp1_input", "");
+    EXPECT_EQ(source.read(node).status, 13U);
+    chip.set("temp1_input", "51000");
+    EXPECT_EQ(source.read(node).reading, 51.0);
+}
+
+TEST_F(Hwmon, readsAfreshAtEveryVisit)
+{
+    OneChip chip(Attributes{{"temp1_input", "41000"}});
+    Vorn::Instrumentation cursor;
+    cursor.selectNode(NodeType::Temperature);
+    double value = 0.0;
+    EXPECT_TRUE(cursor.getProperty(Vorn::NodeLexicon::Properties::Reading, value));
+    EXPECT_EQ(value, 41.0);
+    chip.set("temp1_input", "42000");
+    EXPECT_EQ(only(walk()).values.reading, 42.0);
+}
+
+TEST_F(Hwmon, aLabelIsMadeValidAndTrimmed)
+{
+    const auto description = [](const std::string& label) {
+        return nodeOf({{"temp1_input", "1000"}, {"temp1_label", label}}).description;
+    };
+    EXPECT_EQ(description("CPU Temp"), "CPU Temp");
+    EXPECT_EQ(description("  \tCPU Temp  "), "CPU Temp");
+    EXPECT_EQ(description("\u6E29\u5EA6"), "\u6E29\u5EA6");
+    EXPECT_EQ(description("Temp \xB0"
+                          "C"),
+        "Temp \xEF\xBF\xBD"
+        "C");
+    EXPECT_EQ(description("   "), "temp1");
+    EXPECT_EQ(description(""), "temp1");
+    EXPECT_EQ(nodeOf({{"temp1_input", "1000"}}).description, "temp1");
+}
+
+TEST_F(Hwmon, theConfigurationLabelsComputesAndIgnores)
+{
+    configuration().write("chip \"testchip-*\"\n"
+                          "  label temp1 \"  Board \xFF \"\n"
+                          "  compute temp1 @*2, @/2\n"
+                          "  ignore temp2\n");
+    const OneChip chip({{"temp1_input", "20000"}, {"temp1_max", "30000"}, {"temp1_label", "raw"},
+        {"temp2_input", "1000"}});
+    const SeenNode node = only(walk());
+    EXPECT_EQ(node.description, "Board \xEF\xBF\xBD");
+    EXPECT_EQ(node.values.reading, 40.0);
+    EXPECT_EQ(node.values.upperNonCritical, 60.0);
+}
+
+TEST_F(Hwmon, aValueComputedToNoNumberIsLost)
+{
+    configuration().write("chip \"*-*\"\n  compute temp1 1/(@-@), @\n");
+    EXPECT_EQ(nodeOf({{"temp1_input", "20000"}}).values.status, 13U);
+}
+
+TEST_F(Hwmon, chipsAreSortedByNameAndFeaturesStandAsInTheDriver)
+{
+    BoundSysfs sysfs("");
+    for (const std::string name : {"zeta", "alpha", "mid"}) {
+        const std::string folder = "hwmon" + name;
+        sysfs.addChip(folder, name, "platform", name + ".1");
+        for (const std::string feature : {"temp10", "temp2", "temp1"})
+            sysfs.write("hwmon/" + folder + "/" + feature + "_input", "1000\n");
+    }
+    std::vector<std::string> paths;
+    for (const SeenNode& node : walk())
+        paths.push_back(node.path);
+    EXPECT_THAT(paths,
+        ElementsAre("/hwmon/alpha-isa-0001/temp1", "/hwmon/alpha-isa-0001/temp2",
+            "/hwmon/alpha-isa-0001/temp10", "/hwmon/mid-isa-0001/temp1",
+            "/hwmon/mid-isa-0001/temp2", "/hwmon/mid-isa-0001/temp10", "/hwmon/zeta-isa-0001/temp1",
+            "/hwmon/zeta-isa-0001/temp2", "/hwmon/zeta-isa-0001/temp10"));
+}
+
+TEST_F(Hwmon, aWrongConfigurationIsReportedOnceAndTheRestHolds)
+{
+    const Testing::LogCapture capture;
+    configuration().write("chip \"testchip-*\"\n  label temp1 \"Board\"\n  nonsense here\n");
+    OneChip chip(Attributes{{"temp1_input", "20000"}});
+    EXPECT_EQ(only(walk()).description, "Board");
+    chip.sysfs().addChip("hwmon7", "other", "platform", "other.1"); // the list is made anew
+    walk();
+    ASSERT_THAT(capture.log(), SizeIs(1));
+    EXPECT_THAT(capture.log()[0].text, HasSubstr("/etc/sensors3.conf:3: "));
+    EXPECT_EQ(capture.log()[0].component, "Nimbrel.Instrumentation");
+    EXPECT_EQ(capture.log()[0].level, 6000);
+}
+
+TEST_F(Hwmon, aConfigurationMayBeWrongFromTheFirstLineOnThoughItIsReadAgain)
+{
+    const Testing::LogCapture capture;
+    configuration().write("label temp1 \"Stray\"\nchip \"*\"\n  compute temp1 @*3, @/3\n");
+    OneChip chip(Attributes{{"temp1_input", "20000"}});
+    for (const std::string other : {"a", "b", "c"}) {
+        EXPECT_EQ(nodeAt(walk(), testchip("temp1")).description, "temp1");
+        chip.sysfs().addChip("hwmon" + other, other, "platform", other + ".1");
+    }
+    ASSERT_THAT(capture.log(), SizeIs(1));
+    EXPECT_EQ(capture.log()[0].text, "/etc/sensors3.conf:2: Parse error in chip name");
+}
+
+TEST_F(Hwmon, theFolderOfConfigurationsAddsToTheFile)
+{
+    const Testing::LogCapture capture;
+    const Testing::TemporaryFolder folder;
+    folder.write("10-label.conf", "chip \"testchip-*\"\n  label temp1 \"First\" \\");
+    folder.write("20-wrong.conf", "\n\nnonsense here\n");
+    folder.write(".hidden", "chip \"testchip-*\"\n  ignore temp1\n");
+    const Testing::BindMount bound(folder.path(), "/etc/sensors.d");
+    EXPECT_EQ(nodeOf({{"temp1_input", "20000"}}).description, "First");
+    ASSERT_THAT(capture.log(), SizeIs(1));
+    EXPECT_THAT(capture.log()[0].text, HasSubstr("/etc/sensors.d/20-wrong.conf:3: "));
+}
+
+TEST_F(Hwmon, aConfigurationThatCannotBeReadIsNamed)
+{
+    const Testing::TemporaryFolder folder;
+    folder.write("large.conf", std::string(2'000'000, '\n'));
+    const Testing::BindMount bound(folder.path(), "/etc/sensors.d");
+    const OneChip chip(Attributes{{"temp1_input", "20000"}});
+    EXPECT_EQ(Testing::errorOf([] { walk(); }),
+        "sensors configuration /etc/sensors.d/large.conf: Larger than 1048576 bytes");
+}
+
+TEST_F(Hwmon, aMachineWithoutSysfsSaysThatLibsensorsCannotBeUsed)
+{
+    const Testing::LogCapture capture;
+    const Testing::TemporaryFolder empty;
+    std::filesystem::create_directories(empty.path() / "class/hwmon");
+    {
+        const Testing::BindMount noSysfs(empty.path(), "/sys");
+        for (int request = 0; request < 2; ++request)
+            EXPECT_EQ(Testing::errorOf([] { walk(); }),
+                "libsensors cannot list the chips: Kernel interface error");
+    }
+    EXPECT_THAT(capture.log(), SizeIs(1));
+    EXPECT_EQ(nodeOf({{"temp1_input", "20000"}}).values.reading, 20.0);
+}
+
+TEST_F(Hwmon, aFatalErrorOfLibsensorsIsALackOfMemoryAndNotTheEndOfTheProcess)
+{
+    const OneChip chip(Attributes{{"temp1_input", "20000"}});
+    walk();
+    EXPECT_THROW(sensors_fatal_error("sensors_malloc", "Out of memory"), std::bad_alloc);
+}
+
+} // namespace

@@ -1,0 +1,341 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "platform/instrumentation/Instrumentation.h"
+
+#include "platform/instrumentation/SourceRegistry.h"
+#include "tests/platform/instrumentation/Walk.h"
+#include "tests/support/Environment.h"
+#include "tests/support/LogCapture.h"
+#include "tests/support/ScriptedMachine.h"
+
+#include <gmock/gmock.h>
+
+#include <thread>
+
+namespace {
+
+using testing::ElementsAre;
+using Testing::EnvironmentVariable;
+using Testing::errorOf;
+using testing::HasSubstr;
+using testing::IsEmpty;
+using Testing::LogCapture;
+using Testing::ScriptedMachine;
+using testing::SizeIs;
+using Testing::walk;
+using Vorn::Instrumentation;
+using Vorn::NodeLexicon::NodeType;
+using Vorn::NodeLexicon::Properties;
+
+// Counts its readings, so that every one differs from the others.
+class CountingSource final : public Vorn::Source {
+public:
+    std::vector<Vorn::Node> nodes(NodeType type) override
+    {
+        return {{"/a", "A", static_cast<unsigned>(type), 0}, {"/b", "B", 99, 1}};
+    }
+    Vorn::NodeReading read(const Vorn::Node&) override
+    {
+        ++count_;
+        return {.status = count_, .reading = count_};
+    }
+
+private:
+    unsigned count_ = 0;
+};
+
+struct CountingMachine {
+    CountingMachine()
+    {
+        Vorn::registerSource(
+            "counting", [](const std::string&) { return std::make_unique<CountingSource>(); });
+    }
+    EnvironmentVariable environment{"VORN_INSTRUMENTATION", "counting"};
+};
+
+double readingAt(Instrumentation& cursor)
+{
+    double value = 0.0;
+    EXPECT_TRUE(cursor.getProperty(Properties::Reading, value));
+    return value;
+}
+
+TEST(Cursor, readsANodeOncePerVisitAndAfreshAtTheNext)
+{
+    const CountingMachine machine;
+    Instrumentation cursor;
+    cursor.selectNode(NodeType::Voltage);
+    EXPECT_EQ(cursor.getNodeStatus(), 1U);
+    EXPECT_EQ(readingAt(cursor), 1.0);
+    ++cursor;
+    EXPECT_EQ(readingAt(cursor), 2.0);
+    EXPECT_EQ(cursor.getNodeStatus(), 2U);
+    cursor.selectNode(NodeType::Voltage);
+    EXPECT_EQ(cursor.getNodeStatus(), 3U);
+}
+
+TEST(Cursor, doesNotReadANodeThatNobodyAsks)
+{
+    const CountingMachine machine;
+    Instrumentation cursor;
+    cursor.selectNode(NodeType::Voltage);
+    EXPECT_EQ(cursor.getPathToNode(), "/a");
+    EXPECT_EQ(cursor.getNodeDescription(), "A");
+    EXPECT_EQ(cursor.getSensorType(), 21U);
+    ++cursor;
+    EXPECT_EQ(cursor.getSensorType(), 99U);
+    EXPECT_EQ(cursor.getNodeStatus(), 1U);
+}
+
+TEST(Cursor, standsOnNothingBeforeASelectionAndAfterTheLastNode)
+{
+    const CountingMachine machine;
+    Instrumentation cursor;
+    EXPECT_FALSE(cursor);
+    cursor.selectNode(NodeType::Voltage);
+    EXPECT_TRUE(cursor);
+    ++cursor;
+    EXPECT_TRUE(cursor);
+    ++cursor;
+    EXPECT_FALSE(cursor);
+    EXPECT_THROW(cursor.getPathToNode(), std::out_of_range);
+    EXPECT_THROW(cursor.getNodeStatus(), std::out_of_range);
+}
+
+TEST(Cursor, showsTheNodesOfAllSourcesInTheOrderOfTheSetting)
+{
+    const ScriptedMachine scripted({{NodeType::Voltage, "/s", "S", {}}});
+    const CountingMachine counting;
+    const EnvironmentVariable both("VORN_INSTRUMENTATION", "scripted,counting");
+    std::vector<std::string> paths;
+    Instrumentation cursor;
+    for (cursor.selectNode(NodeType::Voltage); cursor; ++cursor)
+        paths.push_back(cursor.getPathToNode());
+    EXPECT_THAT(paths, ElementsAre("/s", "/a", "/b"));
+}
+
+TEST(Cursor, givesAPropertyOnlyInItsOwnKind)
+{
+    const ScriptedMachine machine({{NodeType::Temperature, "/n", "N",
+        {.reading = 1,
+            .lowerNonCritical = 2,
+            .upperNonCritical = 3,
+            .lowerCritical = 4,
+            .upperCritical = 5,
+            .lowerFatal = 6,
+            .upperFatal = 7,
+            .baseUnits = 8,
+            .possibleStates = {{9}}}}});
+    Instrumentation cursor;
+    cursor.selectNode(NodeType::Temperature);
+    double number = -1;
+    unsigned code = 77;
+    std::vector<unsigned> codes{77};
+    const std::pair<Properties, double> numbers[] = {{Properties::Reading, 1},
+        {Properties::LowerNonCritical, 2}, {Properties::UpperNonCritical, 3},
+        {Properties::LowerCritical, 4}, {Properties::UpperCritical, 5}, {Properties::LowerFatal, 6},
+        {Properties::UpperFatal, 7}};
+    for (const auto& [property, value] : numbers) {
+        EXPECT_TRUE(cursor.getProperty(property, number));
+        EXPECT_EQ(number, value);
+        EXPECT_FALSE(cursor.getProperty(property, code));
+        EXPECT_FALSE(cursor.getProperty(property, codes));
+    }
+    for (const Properties property : {Properties::BaseUnits, Properties::PossibleStates})
+        EXPECT_FALSE(cursor.getProperty(property, number));
+    EXPECT_FALSE(cursor.getProperty(Properties::PossibleStates, code));
+    EXPECT_FALSE(cursor.getProperty(Properties::BaseUnits, codes));
+    EXPECT_EQ(number, 7);
+    EXPECT_EQ(code, 77U);
+    EXPECT_THAT(codes, ElementsAre(77));
+    EXPECT_TRUE(cursor.getProperty(Properties::BaseUnits, code));
+    EXPECT_TRUE(cursor.getProperty(Properties::PossibleStates, codes));
+    EXPECT_EQ(code, 8U);
+    EXPECT_THAT(codes, ElementsAre(9));
+}
+
+TEST(Cursor, leavesTheValueAloneWhenTheNodeLacksTheProperty)
+{
+    const ScriptedMachine machine({{NodeType::Temperature, "/n", "N", {}}});
+    Instrumentation cursor;
+    cursor.selectNode(NodeType::Temperature);
+    double number = 4.5;
+    unsigned code = 7;
+    std::vector<unsigned> codes{7};
+    EXPECT_FALSE(cursor.getProperty(Properties::Reading, number));
+    EXPECT_FALSE(cursor.getProperty(Properties::BaseUnits, code));
+    EXPECT_FALSE(cursor.getProperty(Properties::PossibleStates, codes));
+    EXPECT_EQ(number, 4.5);
+    EXPECT_EQ(code, 7U);
+    EXPECT_THAT(codes, ElementsAre(7));
+}
+
+TEST(Cursor, makesPathsPrintable)
+{
+    const CountingMachine machine;
+    const Instrumentation cursor;
+    EXPECT_EQ(cursor.convertPathToString("/board/cpu 0/temp1"), "/board/cpu 0/temp1");
+    EXPECT_EQ(cursor.convertPathToString("/a\n\xFF"), "/a\\x0a\xEF\xBF\xBD");
+}
+
+TEST(Settings, anUnknownKindOfSourceIsNamed)
+{
+    const EnvironmentVariable environment("VORN_INSTRUMENTATION", "hwmon,ipmb:3");
+    EXPECT_THAT(errorOf([] { Instrumentation cursor; }),
+        testing::AllOf(HasSubstr("\"ipmb:3\""), HasSubstr("hwmon, model")));
+}
+
+TEST(Settings, wrongArgumentsAreNamed)
+{
+    const EnvironmentVariable noFile("VORN_INSTRUMENTATION", "model");
+    EXPECT_THAT(errorOf([] { Instrumentation cursor; }), HasSubstr("\"model\" names no file"));
+    const EnvironmentVariable argument("VORN_INSTRUMENTATION", "hwmon:x");
+    EXPECT_THAT(errorOf([] { Instrumentation cursor; }), HasSubstr("\"hwmon:x\""));
+}
+
+TEST(Settings, anEmptyEntryIsAnError)
+{
+    const EnvironmentVariable environment("VORN_INSTRUMENTATION", "hwmon,");
+    EXPECT_THAT(errorOf([] { Instrumentation cursor; }), HasSubstr("\"hwmon,\""));
+}
+
+TEST(Settings, anEmptyListMeansTheDefault)
+{
+    const EnvironmentVariable environment("VORN_INSTRUMENTATION", "");
+    EXPECT_NO_THROW(Instrumentation());
+}
+
+TEST(Settings, areReadAtEveryConstruction)
+{
+    const ScriptedMachine machine({{NodeType::Voltage, "/v", "V", {}}});
+    EXPECT_THAT(walk(), SizeIs(1));
+    const CountingMachine counting;
+    EXPECT_THAT(walk(), SizeIs(6));
+}
+
+TEST(Registry, replacesAKindOfSource)
+{
+    const ScriptedMachine first({{NodeType::Voltage, "/1", "1", {}}});
+    const ScriptedMachine second({{NodeType::Voltage, "/2", "2", {}}});
+    EXPECT_EQ(walk().at(0).path, "/2");
+}
+
+TEST(Registry, isSafeToUseFromManyThreads)
+{
+    const CountingMachine machine;
+    std::vector<std::jthread> threads;
+    for (int thread = 0; thread < 8; ++thread)
+        threads.emplace_back([thread] {
+            for (int turn = 0; turn < 50; ++turn) {
+                Vorn::registerSource("many" + std::to_string(thread),
+                    [](const std::string&) { return std::make_unique<CountingSource>(); });
+                EXPECT_THAT(walk(), SizeIs(6));
+            }
+        });
+}
+
+// Three cursors, as one request builds them; a failure of one does not keep the next from work.
+void request()
+{
+    for (const NodeType type : {NodeType::Temperature, NodeType::Voltage, NodeType::Tachometer})
+        errorOf([&] {
+            Instrumentation cursor;
+            for (cursor.selectNode(type); cursor; ++cursor)
+                cursor.getNodeStatus();
+        });
+}
+
+std::vector<std::string> textsOf(const LogCapture& capture)
+{
+    std::vector<std::string> texts;
+    for (const Testing::LogLine& line : capture.log()) {
+        EXPECT_EQ(line.level, 6000);
+        EXPECT_EQ(line.component, "Nimbrel.Instrumentation");
+        texts.push_back(line.text);
+    }
+    return texts;
+}
+
+// A failure that an earlier test left on record would not be reported.
+class Failure : public testing::Test {
+protected:
+    void TearDown() override
+    {
+        const ScriptedMachine working;
+        request();
+    }
+};
+
+TEST_F(Failure, atConstructionIsReportedOnce)
+{
+    const LogCapture capture;
+    ScriptedMachine machine;
+    machine.failConstruction();
+    EXPECT_EQ(errorOf([] { Instrumentation cursor; }), "scripted: construction");
+    request();
+    request();
+    EXPECT_THAT(textsOf(capture),
+        ElementsAre("source \"scripted\" cannot be used: scripted: construction"));
+}
+
+TEST_F(Failure, thatComesBackIsReportedAgain)
+{
+    const LogCapture capture;
+    ScriptedMachine machine;
+    machine.failConstruction();
+    request();
+    machine.failConstruction(false);
+    request();
+    machine.failConstruction();
+    request();
+    EXPECT_THAT(textsOf(capture), SizeIs(2));
+}
+
+TEST_F(Failure, ofOneNodeTypeIsReportedOnceThoughTheOthersWork)
+{
+    const LogCapture capture;
+    ScriptedMachine machine;
+    machine.failSelection(NodeType::Voltage);
+    request();
+    request();
+    EXPECT_THAT(
+        textsOf(capture), ElementsAre("source \"scripted\" cannot be used: scripted: selection"));
+}
+
+TEST_F(Failure, ofAReadingIsReportedOnceThoughOtherNodesCanBeRead)
+{
+    const LogCapture capture;
+    const ScriptedMachine machine({{NodeType::Voltage, "/1", "1", {}},
+        {.type = NodeType::Voltage, .path = "/2", .description = "2", .failsWhenRead = true},
+        {NodeType::Temperature, "/3", "3", {}}});
+    request();
+    request();
+    EXPECT_THAT(
+        textsOf(capture), ElementsAre("source \"scripted\" cannot be used: scripted: reading"));
+}
+
+TEST_F(Failure, withAnotherReasonIsReported)
+{
+    const LogCapture capture;
+    const EnvironmentVariable environment("VORN_INSTRUMENTATION", "reasons");
+    std::string reason = "first";
+    Vorn::registerSource("reasons", [&](const std::string&) -> std::unique_ptr<Vorn::Source> {
+        throw std::runtime_error(reason);
+    });
+    request();
+    reason = "second";
+    request();
+    EXPECT_THAT(textsOf(capture), ElementsAre("source \"reasons\" cannot be used: first",
+                                      "source \"reasons\" cannot be used: second"));
+}
+
+TEST_F(Failure, ofASettingIsReportedOnce)
+{
+    const LogCapture capture;
+    const EnvironmentVariable environment("VORN_INSTRUMENTATION", "nonsense,");
+    request();
+    request();
+    EXPECT_THAT(textsOf(capture), SizeIs(1));
+}
+
+} // namespace

@@ -1,0 +1,69 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "platform/instrumentation/Recorder.h"
+
+#include "platform/instrumentation/model/ModelReader.h"
+#include "tests/platform/instrumentation/Walk.h"
+#include "tests/support/ScriptedMachine.h"
+
+#include <gmock/gmock.h>
+
+#include <limits>
+
+namespace {
+
+using Testing::ScriptedMachine;
+using testing::SizeIs;
+using Vorn::recordModel;
+using Vorn::NodeLexicon::NodeType;
+
+TEST(Recorder, walksTemperaturesThenVoltagesThenTachometers)
+{
+    const ScriptedMachine machine({{NodeType::Tachometer, "/f", "", {}},
+        {NodeType::Voltage, "/v", "", {}}, {NodeType::Temperature, "/t", "", {}}});
+    const auto nodes = Vorn::readModel(recordModel());
+    ASSERT_THAT(nodes, SizeIs(3));
+    EXPECT_EQ(nodes[0].path, "/t");
+    EXPECT_EQ(nodes[1].path, "/v");
+    EXPECT_EQ(nodes[2].path, "/f");
+}
+
+TEST(Recorder, leavesOutNumbersThatAreNotFinite)
+{
+    const ScriptedMachine machine({{NodeType::Voltage, "/v", "",
+        {.reading = std::numeric_limits<double>::quiet_NaN(),
+            .lowerCritical = 1.5,
+            .upperCritical = std::numeric_limits<double>::infinity()}}});
+    const auto nodes = Vorn::readModel(recordModel());
+    EXPECT_FALSE(nodes.at(0).values.reading);
+    EXPECT_FALSE(nodes.at(0).values.upperCritical);
+    EXPECT_EQ(nodes.at(0).values.lowerCritical, 1.5);
+}
+
+TEST(Recorder, makesPathsUnique)
+{
+    const ScriptedMachine machine({{NodeType::Voltage, "/v", "1", {}},
+        {NodeType::Voltage, "/v", "2", {}}, {NodeType::Tachometer, "/v", "3", {}}});
+    const auto nodes = Vorn::readModel(recordModel());
+    ASSERT_THAT(nodes, SizeIs(3));
+    EXPECT_EQ(nodes[0].path, "/v");
+    EXPECT_EQ(nodes[1].path, "/v#2");
+    EXPECT_EQ(nodes[2].path, "/v#3");
+}
+
+TEST(Recorder, makesTextsValid)
+{
+    const ScriptedMachine machine({{NodeType::Voltage, "/\xFF", "a\xFE", {}}});
+    const auto nodes = Vorn::readModel(recordModel());
+    EXPECT_EQ(nodes.at(0).path, "/\xEF\xBF\xBD");
+    EXPECT_EQ(nodes.at(0).description, "a\xEF\xBF\xBD");
+}
+
+TEST(Recorder, passesOnTheErrorOfASource)
+{
+    ScriptedMachine machine;
+    machine.failConstruction();
+    EXPECT_EQ(Testing::errorOf([] { recordModel(); }), "scripted: construction");
+}
+
+} // namespace

@@ -1,0 +1,104 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// The files that describe models to people and tools, against the reader.
+
+#include "platform/instrumentation/ModelFile.h"
+#include "platform/instrumentation/hwmon/Status.h"
+#include "platform/instrumentation/model/ModelMembers.h"
+#include "tests/platform/instrumentation/Walk.h"
+#include "tests/support/Environment.h"
+
+#include <gmock/gmock.h>
+#include <nlohmann/json.hpp>
+
+#include <fstream>
+#include <map>
+#include <set>
+
+namespace {
+
+using Testing::SeenNode;
+using testing::UnorderedElementsAreArray;
+namespace Member = Vorn::ModelMember;
+
+const std::string folder = SENSOR_PROFILE_SOURCE_DIR "/schema/";
+
+nlohmann::json schema()
+{
+    std::ifstream file(folder + "sensor-profile-model.schema.json");
+    return nlohmann::json::parse(file);
+}
+
+std::vector<SeenNode> demoMachine()
+{
+    const Testing::EnvironmentVariable environment(
+        "VORN_INSTRUMENTATION", Vorn::modelFileEntry(folder + "demo-model.json"));
+    return Testing::walk();
+}
+
+TEST(Schema, hasTheMembersThatTheReaderHas)
+{
+    const auto document = schema();
+    const auto& node = document.at("$defs").at("node");
+    std::vector<std::string> names;
+    for (const auto& [name, member] : node.at("properties").items())
+        names.push_back(name);
+    EXPECT_THAT(names, UnorderedElementsAreArray(Member::all));
+    EXPECT_EQ(node.at("required"), (nlohmann::json{"type", "path", "description"}));
+    EXPECT_EQ(node.at("additionalProperties"), false);
+    EXPECT_EQ(document.at("required"), nlohmann::json{Member::nodes});
+    EXPECT_EQ(document.at("additionalProperties"), false);
+}
+
+TEST(Schema, hasTheTypesThatTheReaderHas)
+{
+    std::vector<std::string_view> names;
+    for (const Member::TypeName& type : Member::typeNames)
+        names.push_back(type.name);
+    const auto types = schema().at("/$defs/node/properties/type/enum"_json_pointer);
+    EXPECT_EQ(types, nlohmann::json(names));
+}
+
+TEST(Schema, numbersAreTheNumbersOfTheReader)
+{
+    const auto members = schema().at("/$defs/node/properties"_json_pointer);
+    for (const Member::Number& number : Member::numbers)
+        EXPECT_EQ(members.at(std::string(number.name)).at("type"), "number");
+    EXPECT_EQ(schema().at("/$defs/code/maximum"_json_pointer), 4294967295U);
+}
+
+// Every sensor's status is what its reading and its limits make it.
+TEST(DemoModel, isConsistent)
+{
+    for (const SeenNode& node : demoMachine()) {
+        const Vorn::NodeReading& values = node.values;
+        const Vorn::Hwmon::Channel channel{.isEnabled = values.status != 16,
+            .reading = values.reading,
+            .limits = {.min = values.lowerNonCritical,
+                .max = values.upperNonCritical,
+                .lcrit = values.lowerCritical,
+                .crit = values.upperCritical}};
+        EXPECT_EQ(values.status, Vorn::Hwmon::statusOf(channel)) << node.path;
+        EXPECT_EQ(node.sensorType, static_cast<unsigned>(node.type));
+        ASSERT_TRUE(values.possibleStates) << node.path;
+        if (values.status != 13) {
+            EXPECT_THAT(*values.possibleStates, testing::Contains(values.status)) << node.path;
+        }
+    }
+}
+
+TEST(DemoModel, showsSensorsOfEveryKindInEveryStateThatMatters)
+{
+    std::map<Vorn::NodeLexicon::NodeType, int> kinds;
+    std::set<unsigned> statuses;
+    for (const SeenNode& node : demoMachine()) {
+        ++kinds[node.type];
+        statuses.insert(node.values.status);
+    }
+    EXPECT_THAT(kinds, testing::SizeIs(3));
+    for (const auto& [type, count] : kinds)
+        EXPECT_GE(count, 8);
+    EXPECT_THAT(statuses, testing::ElementsAre(1, 13, 16, 22, 23, 25, 26));
+}
+
+} // namespace

@@ -1,0 +1,59 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "platform/instrumentation/SourceList.h"
+
+#include "platform/instrumentation/ModelFile.h"
+#include "tests/platform/instrumentation/Walk.h"
+
+#include <gmock/gmock.h>
+
+namespace {
+
+using Testing::errorOf;
+using testing::HasSubstr;
+using Vorn::parseSourceList;
+
+TEST(SourceList, splitsEntriesAtCommasAndArgumentsAtTheFirstColon)
+{
+    const auto entries = parseSourceList("hwmon,model:/srv/a:b.json");
+    ASSERT_EQ(entries.size(), 2U);
+    EXPECT_EQ(entries[0].text, "hwmon");
+    EXPECT_EQ(entries[0].scheme, "hwmon");
+    EXPECT_EQ(entries[0].argument, "");
+    EXPECT_EQ(entries[1].text, "model:/srv/a:b.json");
+    EXPECT_EQ(entries[1].scheme, "model");
+    EXPECT_EQ(entries[1].argument, "/srv/a:b.json");
+}
+
+TEST(SourceList, takesACommaAfterABackslashForPartOfTheName)
+{
+    const auto entries = parseSourceList(R"(model:/srv/a\,b\\c.json,hwmon)");
+    ASSERT_EQ(entries.size(), 2U);
+    EXPECT_EQ(entries[0].argument, R"(/srv/a,b\c.json)");
+    EXPECT_EQ(entries[1].scheme, "hwmon");
+}
+
+TEST(SourceList, readsBackEveryFileName)
+{
+    for (const std::string name : {"/a.json", "/a,b", R"(/a\b)", R"(\,\)", "a:b", " "}) {
+        const auto entries = parseSourceList(Vorn::modelFileEntry(name));
+        ASSERT_EQ(entries.size(), 1U) << name;
+        EXPECT_EQ(entries[0].scheme, "model");
+        EXPECT_EQ(entries[0].argument, name);
+    }
+}
+
+TEST(SourceList, namesAnEntryWithoutAName)
+{
+    for (const std::string list : {"", ",hwmon", "hwmon,", "hwmon,,model:x"})
+        EXPECT_THAT(
+            errorOf([&] { parseSourceList(list); }), HasSubstr("source \"\" in \"" + list + '"'));
+    EXPECT_THAT(errorOf([] { parseSourceList("hwmon,:x"); }), HasSubstr("source \":x\""));
+}
+
+TEST(SourceList, namesAnEntryThatEndsInALoneBackslash)
+{
+    EXPECT_THAT(errorOf([] { parseSourceList("model:x\\"); }), HasSubstr("\"model:x\\\""));
+}
+
+} // namespace
