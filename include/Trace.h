@@ -1,0 +1,133 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// Trace lines: their formats, the marks that bracket every request, and the one place from
+// which a trace point reaches the log and the trace channel.
+//
+// Every function here may be called from any thread; a line is formatted in buffers of its
+// thread's own.
+
+#pragma once
+
+#include "platform/logging/RynLogger.h"
+#include "platform/logging/RynMessageBuffer.h"
+
+#include <array>
+#include <cstddef>
+#include <cstdio>
+#include <string>
+
+namespace Vorn {
+
+// Selects the format of a trace line; any value but the last three formats as Entering.
+enum MessageType : int { Entering = 0, Exiting = 1, Method = 2, Message = 3 };
+
+// Importance of trace lines, as the logging library's filter takes it.
+enum TraceLevel : int { MarkWithParameters = 3000, Mark = 4000, Failure = 6000 };
+
+// A line is cut to one character less than this.
+inline constexpr std::size_t TraceBufferSize = 512;
+using TraceBuffer = std::array<char, TraceBufferSize>;
+
+namespace detail {
+
+// How the lines of one MessageType read; `parameters` is null for a line without.
+inline char* format(TraceBuffer& buffer, const char* text, const char* file, unsigned line,
+    const char* parameters, MessageType type)
+{
+    const char* const label = parameters ? ",Parameters List: " : "";
+    const char* const list = parameters ? parameters : "";
+    buffer.fill('\0');
+    switch (type) {
+    case Method:
+        std::snprintf(buffer.data(), buffer.size(), "METHOD: %s() was invoked in %s [Line: %u]%s%s",
+            text, file, line, label, list);
+        break;
+    case Message:
+        std::snprintf(buffer.data(), buffer.size(), "MESSAGE [File: %s, Line: %u]: %s%s%s", file,
+            line, text, label, list);
+        break;
+    case Exiting:
+        std::snprintf(buffer.data(), buffer.size(), "EXITING: %s() in %s [Line: %u]%s%s", text,
+            file, line, label, list);
+        break;
+    case Entering:
+    default:
+        std::snprintf(buffer.data(), buffer.size(), "ENTERING: %s() in %s [Line: %u]%s%s", text,
+            file, line, label, list);
+        break;
+    }
+    return buffer.data();
+}
+
+} // namespace detail
+
+// Formats a line into the calling thread's trace buffer, which the next call overwrites.
+// `text` is the function's name or the message, `file` the calling module's name.
+inline char* trace(const char* text, const char* file, unsigned line, MessageType type)
+{
+    static thread_local TraceBuffer buffer;
+    return detail::format(buffer, text, file, line, nullptr, type);
+}
+
+// The same with a parameter list, in a buffer of its own.
+inline char* tracepara(
+    const char* text, const char* file, unsigned line, const char* parameters, MessageType type)
+{
+    static thread_local TraceBuffer buffer;
+    return detail::format(buffer, text, file, line, parameters, type);
+}
+
+// Where a trace point stands, as the logging library is told.
+struct TraceLocation {
+    const char* function;
+    const char* file;
+    unsigned line;
+};
+
+// Sends one trace point to the log channel and to the trace channel. `line` formats the text
+// and is called once for each channel; not at all when neither wants the level.
+template <typename Line>
+void emit(const TraceLocation& at, const std::string& component, int level, const Line& line)
+{
+    if (!RynLog::RynLogger::isWanted(level))
+        return;
+    RynLog::RynMessageBuffer buffer;
+    buffer << line();
+    RynLog::RynLogger::logLevelMessage(
+        at.function, at.file, at.line, component, level, nullptr, 0, 0, buffer.str());
+    buffer << line();
+    RynLog::RynLogger::traceLevelMessage(
+        at.function, at.file, at.line, component, level, nullptr, 0, 0, buffer.str());
+}
+
+namespace detail {
+
+inline constexpr const char* TraceFile = "Trace";
+
+// 78 equals signs set one request's lines apart from the next one's.
+inline const char* separator()
+{
+    return "==============================================================================";
+}
+
+} // namespace detail
+
+// Opens the bracket around a request: a separator and the handler's entering line.
+inline void markProviderEntry(
+    const std::string& component, const char* function, const char* file, unsigned line)
+{
+    emit({"markProviderEntry", detail::TraceFile, 336}, component, Mark, detail::separator);
+    emit({"markProviderEntry", detail::TraceFile, 337}, component, Mark,
+        [&] { return trace(function, file, line, Entering); });
+}
+
+// Closes the bracket: the handler's exiting line and a separator.
+inline void markProviderExit(
+    const std::string& component, const char* function, const char* file, unsigned line)
+{
+    emit({"markProviderExit", detail::TraceFile, 348}, component, Mark,
+        [&] { return trace(function, file, line, Exiting); });
+    emit({"markProviderExit", detail::TraceFile, 349}, component, Mark, detail::separator);
+}
+
+} // namespace Vorn

@@ -1,0 +1,39 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "include/ProviderException.h"
+
+#include <gtest/gtest.h>
+
+#include <memory>
+
+namespace {
+
+using Vorn::ProviderException;
+
+TEST(ProviderException, anEmptyMessageGivesAnEmptyText)
+{
+    EXPECT_STREQ(ProviderException("").what(), "");
+}
+
+TEST(ProviderException, aCopyKeepsItsTextWhenTheSourceIsGone)
+{
+    auto source = std::make_unique<ProviderException>("Failed while setting Device ID");
+    const ProviderException copy(*source);
+    source.reset();
+    EXPECT_STREQ(copy.what(), "Failed while setting Device ID");
+}
+
+TEST(ProviderException, theBaseClassesWhatGivesTheMessage)
+{
+    const ProviderException exception("Failed while setting Health State");
+    const std::exception& base = exception;
+    EXPECT_STREQ(base.what(), "Failed while setting Health State");
+}
+
+TEST(ProviderException, aLongMessageIsKeptWhole)
+{
+    const std::string text(10000, 'x');
+    EXPECT_EQ(ProviderException(text.c_str()).what(), text);
+}
+
+} // namespace

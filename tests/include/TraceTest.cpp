@@ -1,0 +1,183 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "include/Trace.h"
+
+#include "include/TracedOperation.h"
+#include "tests/support/LogCapture.h"
+
+#include <gtest/gtest.h>
+
+#include <thread>
+
+namespace {
+
+using namespace Vorn;
+using Testing::LogCapture;
+using Testing::LogLine;
+
+const std::string Component = "Nimbrel.Test";
+const std::string Separator(78, '=');
+
+TEST(Trace, eachTypeHasItsFormat)
+{
+    EXPECT_STREQ(trace("Sensor_GetInstance", "f", 120, Exiting),
+        "EXITING: Sensor_GetInstance() in f [Line: 120]");
+    EXPECT_STREQ(trace("Sensor_GetInstance", "f", 120, Entering),
+        "ENTERING: Sensor_GetInstance() in f [Line: 120]");
+    EXPECT_STREQ(trace("sensor", "f", 12, Method), "METHOD: sensor() was invoked in f [Line: 12]");
+    EXPECT_STREQ(trace("t", "f", 7, Message), "MESSAGE [File: f, Line: 7]: t");
+}
+
+TEST(Trace, theNumbersOfTheTypesAreFixed)
+{
+    EXPECT_EQ(Entering, 0);
+    EXPECT_EQ(Exiting, 1);
+    EXPECT_EQ(Method, 2);
+    EXPECT_EQ(Message, 3);
+}
+
+TEST(Trace, anyOtherTypeIsAnEnteringLine)
+{
+    EXPECT_STREQ(trace("f", "F", 1, static_cast<MessageType>(9)), "ENTERING: f() in F [Line: 1]");
+    EXPECT_STREQ(trace("f", "F", 1, static_cast<MessageType>(-1)), "ENTERING: f() in F [Line: 1]");
+}
+
+TEST(Trace, aParameterListFollowsEachFormat)
+{
+    EXPECT_STREQ(tracepara("getAllSensorCMPIInstances", "f", 162, " broker=0x1", Entering),
+        "ENTERING: getAllSensorCMPIInstances() in f [Line: 162],Parameters List:  broker=0x1");
+    EXPECT_STREQ(tracepara("g", "f", 1, " a=1", Exiting),
+        "EXITING: g() in f [Line: 1],Parameters List:  a=1");
+    EXPECT_STREQ(tracepara("g", "f", 1, " a=1", Method),
+        "METHOD: g() was invoked in f [Line: 1],Parameters List:  a=1");
+    EXPECT_STREQ(tracepara("t", "f", 7, " a=1", Message),
+        "MESSAGE [File: f, Line: 7]: t,Parameters List:  a=1");
+    EXPECT_STREQ(tracepara("g", "f", 1, " a=1", static_cast<MessageType>(4)),
+        "ENTERING: g() in f [Line: 1],Parameters List:  a=1");
+}
+
+TEST(Trace, aLongLineIsCutAndTheRestOfAShorterOneIsCleared)
+{
+    const std::string longText(2000, 'x');
+    char* const line = trace(longText.c_str(), "f", 1, Message);
+    EXPECT_EQ(std::string(line).size(), TraceBufferSize - 1);
+    EXPECT_EQ(trace("t", "f", 1, Message), line);
+    for (std::size_t i = std::string(line).size(); i < TraceBufferSize; ++i)
+        ASSERT_EQ(line[i], '\0') << i;
+
+    const char* const parameters = tracepara("t", "f", 1, longText.c_str(), Entering);
+    EXPECT_EQ(std::string(parameters).size(), TraceBufferSize - 1);
+}
+
+TEST(Trace, linesWithAndWithoutParametersHaveABufferEach)
+{
+    const char* const plain = trace("a", "f", 1, Entering);
+    const char* const withParameters = tracepara("b", "f", 1, "", Entering);
+    EXPECT_NE(plain, withParameters);
+    EXPECT_STREQ(plain, "ENTERING: a() in f [Line: 1]");
+}
+
+TEST(Trace, eachThreadHasBuffersOfItsOwn)
+{
+    const char* const mine = trace("a", "f", 1, Entering);
+    std::thread([&] { EXPECT_NE(trace("b", "f", 1, Entering), mine); }).join();
+    EXPECT_STREQ(mine, "ENTERING: a() in f [Line: 1]");
+}
+
+TEST(Marks, theEntryMarkIsASeparatorAndAnEnteringLine)
+{
+    const LogCapture capture;
+    markProviderEntry(Component, "Sensor_GetInstance", "SensorProvider", 192);
+    const std::vector<LogLine> expected = {
+        {"log", 4000, Component, "markProviderEntry", "Trace", 336, Separator},
+        {"log", 4000, Component, "markProviderEntry", "Trace", 337,
+            "ENTERING: Sensor_GetInstance() in SensorProvider [Line: 192]"}};
+    EXPECT_EQ(capture.log(), expected);
+}
+
+TEST(Marks, theExitMarkIsAnExitingLineAndASeparator)
+{
+    const LogCapture capture;
+    markProviderExit(Component, "Sensor_GetInstance", "SensorProvider", 293);
+    const std::vector<LogLine> expected = {
+        {"log", 4000, Component, "markProviderExit", "Trace", 348,
+            "EXITING: Sensor_GetInstance() in SensorProvider [Line: 293]"},
+        {"log", 4000, Component, "markProviderExit", "Trace", 349, Separator}};
+    EXPECT_EQ(capture.log(), expected);
+}
+
+TEST(Marks, theTraceChannelReceivesTheSameLinesAsTheLogChannel)
+{
+    const LogCapture capture;
+    markProviderEntry(Component, "f", "F", 1);
+    traceMessage({Component, "F"}, "f", 2, "failed");
+    markProviderExit(Component, "f", "F", 3);
+    auto expected = capture.log();
+    ASSERT_EQ(expected.size(), 5U);
+    for (LogLine& line : expected)
+        line.channel = "trace";
+    EXPECT_EQ(capture.trace(), expected);
+}
+
+TEST(TracedOperation, marksCarryTheParameterListAtLevel3000)
+{
+    const LogCapture capture;
+    const int* const nothing = nullptr;
+    const TracedOperation traced({Component, "F"}, "f",
+        [&] { return parameterList(" isSen=", true, " isCap=", false, " ref=", nothing); });
+    traced.entering(10);
+    traced.exiting(20);
+    const std::vector<LogLine> expected = {
+        {"log", 3000, Component, "f", "F", 10,
+            "ENTERING: f() in F [Line: 10],Parameters List:  isSen=1 isCap=0 ref=0"},
+        {"log", 3000, Component, "f", "F", 20,
+            "EXITING: f() in F [Line: 20],Parameters List:  isSen=1 isCap=0 ref=0"}};
+    EXPECT_EQ(capture.log(), expected);
+}
+
+TEST(TracedOperation, plainMarksHaveLevel4000)
+{
+    const LogCapture capture;
+    const PlainTracedOperation traced({Component, "F"}, "f");
+    traced.entering(10);
+    traced.exiting(20);
+    const std::vector<LogLine> expected = {
+        {"log", 4000, Component, "f", "F", 10, "ENTERING: f() in F [Line: 10]"},
+        {"log", 4000, Component, "f", "F", 20, "EXITING: f() in F [Line: 20]"}};
+    EXPECT_EQ(capture.log(), expected);
+}
+
+TEST(TracedOperation, aMarkWithoutALineNumberCarriesItsSourceLine)
+{
+    const LogCapture capture;
+    const PlainTracedOperation traced({Component, "F"}, "f");
+    traced.entering();
+    const unsigned here = __LINE__ - 1;
+    ASSERT_EQ(capture.log().size(), 1U);
+    EXPECT_EQ(capture.log().front().line, here);
+}
+
+TEST(TracedOperation, aFailureIsAMessageLineAtLevel6000)
+{
+    const LogCapture capture;
+    traceMessage({Component, "F"}, "f", 94, "getAllSensorCMPIObjPaths failed");
+    const std::vector<LogLine> expected = {{"log", 6000, Component, "f", "F", 94,
+        "MESSAGE [File: F, Line: 94]: getAllSensorCMPIObjPaths failed"}};
+    EXPECT_EQ(capture.log(), expected);
+}
+
+TEST(TracedOperation, aParameterListIsNotComposedWhenNobodyWantsIt)
+{
+    const LogCapture capture(6000);
+    bool composed = false;
+    const TracedOperation traced({Component, "F"}, "f", [&] {
+        composed = true;
+        return std::string();
+    });
+    traced.entering();
+    traced.exiting();
+    EXPECT_FALSE(composed);
+    EXPECT_TRUE(capture.log().empty());
+}
+
+} // namespace
