@@ -1,0 +1,101 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#pragma once
+
+#include <cstdint>
+#include <string>
+#include <vector>
+
+namespace Vorn::SensorProfileProvider {
+
+// One numeric sensor in CIM form. Setters take the hardware model's codes (a sensor type, a
+// node status) and store the numbers of the DMTF value maps of CIM_NumericSensor and its
+// ancestors; getters return what the CIM property of the same name is published with.
+//
+// Readings and thresholds are scaled to whole units of 10^UnitModifier: setSensorType()
+// decides the scale and must run before any of their setters.
+//
+// Some getters write to the record before they return: the list-appending ones grow their
+// list at every call, getRateUnits() forgets the rate. Callers that want the plain lists call
+// them once on a copy.
+//
+// A value type for one thread. Nothing throws but for lack of memory.
+class Sensor {
+public:
+    Sensor() = default;
+
+    std::string getDeviceID() const;    // without leading and trailing blanks
+    std::string getElementName() const; // without leading and trailing blanks
+    std::string getCurrentState() const { return currentState_; }
+    std::string getHealthStatus() const { return healthStatus_; } // the property Status
+    std::vector<std::string> getPossibleStates();                 // appends the twelve fixed labels
+    std::uint16_t getBaseUnits() const { return baseUnits_; }
+    std::uint16_t getRateUnits(); // always 0, which it also stores
+    std::int32_t getUnitModifier() const { return unitModifier_; }
+    std::uint16_t getSensorType() const { return sensorType_; }
+    std::uint16_t getEnabledState() const { return enabledState_; }
+    std::uint16_t getRequestedState() const { return requestedState_; }
+    std::uint16_t getHealthState() const { return healthState_; }
+    std::int32_t getCurrentReading() const { return currentReading_; }
+    std::int32_t getLowerThresholdNonCritical() const { return lowerThresholdNonCritical_; }
+    std::int32_t getUpperThresholdNonCritical() const { return upperThresholdNonCritical_; }
+    std::int32_t getLowerThresholdCritical() const { return lowerThresholdCritical_; }
+    std::int32_t getUpperThresholdCritical() const { return upperThresholdCritical_; }
+    std::int32_t getLowerThresholdFatal() const { return lowerThresholdFatal_; }
+    std::int32_t getUpperThresholdFatal() const { return upperThresholdFatal_; }
+    std::vector<std::uint16_t> getOperationalStatus() const { return operationalStatus_; }
+    std::vector<std::uint16_t> getSupportedThresholds(); // appends 0 to 5
+    std::vector<std::uint16_t> getSettableThresholds();  // appends 0 to 5
+
+    // Every setter returns whether the value was accepted. A refused value is stored all the
+    // same; only an empty device identifier, an empty name and a zero rate are refused.
+    bool setDeviceID(std::string deviceID);
+    bool setElementName(std::string elementName);
+    bool setBaseUnits(unsigned code);
+    bool setRateUnits(unsigned code);
+    bool setUnitModifier(int powerOfTen);
+    bool setSensorType(unsigned sensorType);
+    bool setEnabledState(unsigned nodeStatus);
+    bool setRequestedState(unsigned code);
+    bool setHealthState(unsigned nodeStatus); // also the health status
+    bool setCurrentState(unsigned nodeStatus);
+    bool setOperationalStatus(unsigned nodeStatus);             // appends
+    bool setPossibleStates(std::vector<unsigned> nodeStatuses); // replaces
+    bool setCurrentReading(double value);
+    bool setLowerThresholdNonCritical(double value);
+    bool setUpperThresholdNonCritical(double value);
+    bool setLowerThresholdCritical(double value);
+    bool setUpperThresholdCritical(double value);
+    bool setLowerThresholdFatal(double value);
+    bool setUpperThresholdFatal(double value);
+
+private:
+    // In base units times the multiplier, truncated toward zero.
+    bool storeScaled(std::int32_t& field, double value) const;
+
+    std::string deviceID_;
+    std::string currentState_;
+    std::string elementName_;
+    std::vector<std::string> possibleStates_;
+    std::uint16_t baseUnits_ = 0;
+    std::uint16_t rateUnits_ = 0;
+    std::vector<std::uint16_t> supportedThresholds_;
+    std::vector<std::uint16_t> settableThresholds_;
+    std::uint16_t sensorType_ = 0;
+    std::uint16_t enabledState_ = 0;
+    std::uint16_t requestedState_ = 0;
+    std::uint16_t healthState_ = 0;
+    std::string healthStatus_;
+    std::int32_t currentReading_ = 0;
+    std::int32_t unitModifier_ = 0;
+    std::int32_t lowerThresholdNonCritical_ = 0;
+    std::int32_t upperThresholdNonCritical_ = 0;
+    std::int32_t lowerThresholdCritical_ = 0;
+    std::int32_t upperThresholdCritical_ = 0;
+    std::int32_t lowerThresholdFatal_ = 0;
+    std::int32_t upperThresholdFatal_ = 0;
+    double readingMultiplier_ = 1.0;
+    std::vector<std::uint16_t> operationalStatus_;
+};
+
+} // namespace Vorn::SensorProfileProvider

@@ -1,0 +1,173 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "model/SensorHarvest.h"
+
+#include "include/ProviderException.h"
+#include "include/TracedOperation.h"
+#include "platform/instrumentation/Instrumentation.h"
+
+#include <array>
+#include <exception>
+#include <iostream>
+#include <string>
+
+namespace Vorn::SensorProfileProvider {
+
+namespace {
+
+using NodeLexicon::NodeType;
+using NodeLexicon::Properties;
+
+const std::string loggerSensor = "Nimbrel.Sensor";
+
+TraceModule module()
+{
+    return {loggerSensor, "Sensor"};
+}
+
+constexpr std::array<NodeType, 3> HarvestedTypes = {
+    NodeType::Temperature, NodeType::Voltage, NodeType::Tachometer};
+
+// What the request handlers ask of every sensor.
+constexpr unsigned RequestedEnabled = 1;
+
+struct ScaledProperty {
+    Properties property;
+    bool (Sensor::*set)(double);
+    const char* refusal;
+};
+
+// In the order in which they are read.
+constexpr std::array<ScaledProperty, 7> ScaledProperties = {{
+    {Properties::Reading, &Sensor::setCurrentReading, "Failed while setting Current Reading"},
+    {Properties::LowerNonCritical, &Sensor::setLowerThresholdNonCritical,
+        "Failed while setting LowerThresholdNonCritical"},
+    {Properties::UpperNonCritical, &Sensor::setUpperThresholdNonCritical,
+        "Failed while setting UpperThresholdNonCritical"},
+    {Properties::LowerCritical, &Sensor::setLowerThresholdCritical,
+        "Failed while setting LowerThresholdCritical"},
+    {Properties::UpperCritical, &Sensor::setUpperThresholdCritical,
+        "Failed while setting UpperThresholdCritical"},
+    {Properties::LowerFatal, &Sensor::setLowerThresholdFatal,
+        "Failed while setting LowerThresholdFatal"},
+    {Properties::UpperFatal, &Sensor::setUpperThresholdFatal,
+        "Failed while setting UpperThresholdFatal"},
+}};
+
+void require(bool accepted, const char* refusal)
+{
+    if (!accepted)
+        throw ProviderException(refusal);
+}
+
+// One write, so that lines of several threads stay whole.
+void reportOnStandardError(const char* what)
+{
+    std::cerr << std::string(what) + '\n' << std::flush;
+}
+
+void setIdentity(Sensor& sensor, const Instrumentation& node)
+{
+    const std::string path = node.convertPathToString(node.getPathToNode());
+    const std::string description = node.getNodeDescription();
+    require(sensor.setDeviceID(description + ":" + path), "Failed while setting Device ID");
+    require(sensor.setElementName(description), "Failed while setting Element Name");
+    require(sensor.setSensorType(node.getSensorType()), "Failed while setting Sensor Type");
+}
+
+// A node that reports no status leaves the record's states at their defaults.
+void setStatus(Sensor& sensor, unsigned status)
+{
+    if (status == 0)
+        return;
+    require(sensor.setCurrentState(status), "Failed while setting Current State");
+    require(sensor.setEnabledState(status), "Failed while setting Enabled State");
+    require(sensor.setOperationalStatus(status), "Failed while setting Operational Status");
+    require(sensor.setHealthState(status), "Failed while setting Health State");
+}
+
+void setProperties(Sensor& sensor, Instrumentation& node, std::vector<unsigned>& possibleStates)
+{
+    possibleStates.clear();
+    if (node.getProperty(Properties::PossibleStates, possibleStates))
+        require(sensor.setPossibleStates(possibleStates), "Failed while setting Possible States");
+
+    double number = 0.0;
+    for (const ScaledProperty& scaled : ScaledProperties)
+        if (node.getProperty(scaled.property, number))
+            require((sensor.*scaled.set)(number), scaled.refusal);
+
+    unsigned baseUnits = 0;
+    if (node.getProperty(Properties::BaseUnits, baseUnits))
+        require(sensor.setBaseUnits(baseUnits), "Failed while setting Requested State");
+}
+
+// True when there was a node of the type and all of them were walked.
+bool harvestType(NodeType type, std::vector<Sensor>& vectSensor)
+{
+    Instrumentation instrumentation;
+    instrumentation.selectNode(type);
+    if (!instrumentation)
+        return false;
+    return !setVector(vectSensor, instrumentation);
+}
+
+} // namespace
+
+bool getSensorInstances(std::vector<Sensor>& vectSensor)
+{
+    const TracedOperation traced(
+        module(), "getSensorInstances", [&] { return parameterList(" vectSensor=", &vectSensor); });
+    traced.entering(668);
+    bool nothing = true;
+    for (const NodeType type : HarvestedTypes) {
+        try {
+            if (harvestType(type, vectSensor))
+                nothing = false;
+        } catch (const std::exception& error) {
+            // Copied down to the base class on purpose: what is printed is its generic text.
+            const std::exception generic = error;
+            reportOnStandardError(generic.what());
+        }
+    }
+    traced.exiting(732);
+    return nothing;
+}
+
+bool setVector(std::vector<Sensor>& vectSensor, Vorn::Instrumentation& instrumentation)
+{
+    const TracedOperation traced(module(), "setVector", [&] {
+        return parameterList(" vectSensor=", &vectSensor, " instrumentation=", &instrumentation);
+    });
+    traced.entering(740);
+    std::vector<unsigned> possibleStates;
+    while (instrumentation) {
+        Sensor sensor;
+        setIdentity(sensor, instrumentation);
+        setStatus(sensor, instrumentation.getNodeStatus());
+        require(sensor.setRequestedState(RequestedEnabled), "Failed while setting Requested State");
+        setProperties(sensor, instrumentation, possibleStates);
+        vectSensor.push_back(sensor);
+        ++instrumentation;
+    }
+    traced.exiting(920);
+    return false;
+}
+
+bool getSensorEnabledLogCapInstances(std::vector<SensorEnabledLogCap>& vectSensorEnabledLogCap)
+{
+    const TracedOperation traced(module(), "getSensorEnabledLogCapInstances",
+        [&] { return parameterList(" vectSensorEnabledLogCap=", &vectSensorEnabledLogCap); });
+    traced.entering(639);
+    try {
+        vectSensorEnabledLogCap.push_back(SensorEnabledLogCap());
+    } catch (const std::exception& error) {
+        reportOnStandardError(error.what());
+        traced.exiting(654);
+        return true;
+    }
+    traced.exiting(660);
+    return false;
+}
+
+} // namespace Vorn::SensorProfileProvider

@@ -1,0 +1,378 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "model/SensorHarvest.h"
+
+#include "include/ProviderException.h"
+#include "platform/instrumentation/Instrumentation.h"
+#include "tests/support/LogCapture.h"
+#include "tests/support/ScriptedMachine.h"
+
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+#include <sstream>
+
+namespace {
+
+using namespace Vorn::SensorProfileProvider;
+using ::testing::ElementsAre;
+using Testing::LogCapture;
+using Testing::LogLine;
+using Testing::ScriptedMachine;
+using Testing::ScriptedNode;
+using Vorn::Instrumentation;
+using Vorn::NodeReading;
+using Vorn::NodeLexicon::NodeType;
+
+constexpr NodeType Temperature = NodeType::Temperature;
+constexpr NodeType Voltage = NodeType::Voltage;
+constexpr NodeType Tachometer = NodeType::Tachometer;
+
+ScriptedNode node(NodeType type, const std::string& name)
+{
+    return {type, "/" + name, name, NodeReading{}};
+}
+
+std::vector<std::string> names(const std::vector<Sensor>& sensors)
+{
+    std::vector<std::string> found;
+    for (const Sensor& sensor : sensors)
+        found.push_back(sensor.getElementName());
+    return found;
+}
+
+struct Harvest {
+    std::vector<Sensor> sensors;
+    bool nothing;
+    std::string standardError;
+};
+
+Harvest harvest()
+{
+    Harvest result;
+    ::testing::internal::CaptureStderr();
+    result.nothing = getSensorInstances(result.sensors);
+    result.standardError = ::testing::internal::GetCapturedStderr();
+    return result;
+}
+
+std::string address(const void* pointer)
+{
+    std::ostringstream out;
+    out << pointer;
+    return out.str();
+}
+
+TEST(Harvest, ofAMachineWithoutSensorsReportsThatNothingWasFound)
+{
+    const ScriptedMachine machine;
+    const Harvest result = harvest();
+    EXPECT_TRUE(result.nothing);
+    EXPECT_TRUE(result.sensors.empty());
+    EXPECT_EQ(result.standardError, "");
+}
+
+TEST(Harvest, goesThroughTemperaturesThenVoltagesThenTachometers)
+{
+    const ScriptedMachine machine({node(Tachometer, "fan1"), node(Voltage, "in1"),
+        node(Temperature, "temp1"), node(Tachometer, "fan2"), node(Temperature, "temp2")});
+    const Harvest result = harvest();
+    EXPECT_FALSE(result.nothing);
+    EXPECT_THAT(names(result.sensors), ElementsAre("temp1", "temp2", "in1", "fan1", "fan2"));
+}
+
+TEST(Harvest, ofFansAloneSucceeds)
+{
+    const ScriptedMachine machine({node(Tachometer, "fan1")});
+    const Harvest result = harvest();
+    EXPECT_FALSE(result.nothing);
+    EXPECT_EQ(result.sensors.size(), 1U);
+}
+
+TEST(Harvest, appendsToWhatIsThere)
+{
+    const ScriptedMachine machine({node(Tachometer, "fan1")});
+    std::vector<Sensor> sensors(2);
+    EXPECT_FALSE(getSensorInstances(sensors));
+    EXPECT_THAT(names(sensors), ElementsAre("", "", "fan1"));
+}
+
+TEST(Harvest, namesASensorByItsDescriptionAndPath)
+{
+    const ScriptedMachine machine({{Temperature, "/a/b", "CPU 1 Temp", NodeReading{}},
+        {Temperature, "/a/c", "CPU 1 Temp", NodeReading{}}});
+    Harvest result = harvest();
+    ASSERT_EQ(result.sensors.size(), 2U);
+    EXPECT_EQ(result.sensors[0].getDeviceID(), "CPU 1 Temp:/a/b");
+    EXPECT_EQ(result.sensors[1].getDeviceID(), "CPU 1 Temp:/a/c");
+    EXPECT_EQ(result.sensors[0].getElementName(), "CPU 1 Temp");
+}
+
+TEST(Harvest, takesTheTypeThatTheNodeReports)
+{
+    ScriptedNode odd = node(Temperature, "odd");
+    odd.sensorType = 21;
+    ScriptedNode unknown = node(Temperature, "unknown");
+    unknown.sensorType = 99;
+    const ScriptedMachine machine({odd, unknown});
+    Harvest result = harvest();
+    ASSERT_EQ(result.sensors.size(), 2U);
+    EXPECT_EQ(result.sensors[0].getSensorType(), 3);
+    EXPECT_EQ(result.sensors[1].getSensorType(), 0);
+}
+
+TEST(Harvest, fillsEveryFieldOfASensor)
+{
+    NodeReading reading;
+    reading.status = 26;
+    reading.reading = 1.5;
+    reading.lowerNonCritical = 2;
+    reading.upperNonCritical = 3;
+    reading.lowerCritical = 4;
+    reading.upperCritical = 5;
+    reading.lowerFatal = 6;
+    reading.upperFatal = 7;
+    reading.baseUnits = 5;
+    reading.possibleStates = {{1, 26}};
+    const ScriptedMachine machine({{Voltage, "/v", "Vcore", reading}});
+    Harvest result = harvest();
+    ASSERT_EQ(result.sensors.size(), 1U);
+    Sensor& sensor = result.sensors[0];
+    EXPECT_EQ(sensor.getSensorType(), 3);
+    EXPECT_EQ(sensor.getCurrentState(), "CriticalHigh");
+    EXPECT_EQ(sensor.getEnabledState(), 5);
+    EXPECT_EQ(sensor.getOperationalStatus(), std::vector<std::uint16_t>{0});
+    EXPECT_EQ(sensor.getHealthState(), 25);
+    EXPECT_EQ(sensor.getHealthStatus(), "Error");
+    EXPECT_EQ(sensor.getRequestedState(), 2);
+    EXPECT_EQ(sensor.getPossibleStates().size(), 14U);
+    EXPECT_EQ(sensor.getPossibleStates()[1], "CriticalHigh");
+    EXPECT_EQ(sensor.getCurrentReading(), 1500);
+    EXPECT_EQ(sensor.getLowerThresholdNonCritical(), 2000);
+    EXPECT_EQ(sensor.getUpperThresholdNonCritical(), 3000);
+    EXPECT_EQ(sensor.getLowerThresholdCritical(), 4000);
+    EXPECT_EQ(sensor.getUpperThresholdCritical(), 5000);
+    EXPECT_EQ(sensor.getLowerThresholdFatal(), 6000);
+    EXPECT_EQ(sensor.getUpperThresholdFatal(), 7000);
+    EXPECT_EQ(sensor.getBaseUnits(), 5);
+}
+
+TEST(Harvest, ofANodeWithoutStatusOrPropertiesLeavesTheDefaults)
+{
+    const ScriptedMachine machine({node(Temperature, "bare")});
+    Harvest result = harvest();
+    ASSERT_EQ(result.sensors.size(), 1U);
+    Sensor& sensor = result.sensors[0];
+    EXPECT_EQ(sensor.getCurrentState(), "");
+    EXPECT_EQ(sensor.getEnabledState(), 0);
+    EXPECT_TRUE(sensor.getOperationalStatus().empty());
+    EXPECT_EQ(sensor.getHealthState(), 0);
+    EXPECT_EQ(sensor.getHealthStatus(), "");
+    EXPECT_EQ(sensor.getRequestedState(), 2); // always requested enabled
+    EXPECT_EQ(sensor.getPossibleStates().size(), 12U);
+    EXPECT_EQ(sensor.getCurrentReading(), 0);
+    EXPECT_EQ(sensor.getUpperThresholdFatal(), 0);
+    EXPECT_EQ(sensor.getBaseUnits(), 0);
+}
+
+TEST(Harvest, doesNotCarryValuesFromOneNodeToTheNext)
+{
+    NodeReading reading;
+    reading.reading = 50;
+    reading.upperCritical = 90;
+    reading.possibleStates = {{1}};
+    const ScriptedMachine machine(
+        {{Temperature, "/a", "a", reading}, {Temperature, "/b", "b", NodeReading{}}});
+    Harvest result = harvest();
+    ASSERT_EQ(result.sensors.size(), 2U);
+    EXPECT_EQ(result.sensors[1].getCurrentReading(), 0);
+    EXPECT_EQ(result.sensors[1].getUpperThresholdCritical(), 0);
+    EXPECT_EQ(result.sensors[1].getPossibleStates().size(), 12U);
+}
+
+// ---- Failures ----
+
+// What the base class says, never the failure's own text.
+const std::string Generic = "std::exception\n";
+
+TEST(HarvestFailure, atConstructionIsReportedOncePerTypeWithTheGenericText)
+{
+    ScriptedMachine machine({node(Temperature, "t")});
+    machine.failConstruction();
+    const Harvest result = harvest();
+    EXPECT_TRUE(result.nothing);
+    EXPECT_TRUE(result.sensors.empty());
+    EXPECT_EQ(result.standardError, Generic + Generic + Generic);
+}
+
+class HarvestFailureOfType : public ::testing::TestWithParam<NodeType> {
+protected:
+    std::vector<ScriptedNode> nodes() const
+    {
+        return {node(Temperature, "t1"), node(Temperature, "t2"), node(Temperature, "t3"),
+            node(Voltage, "v1"), node(Voltage, "v2"), node(Voltage, "v3"), node(Tachometer, "f1"),
+            node(Tachometer, "f2"), node(Tachometer, "f3")};
+    }
+
+    // The names that are left when the walk of the type ends before the given position.
+    std::vector<std::string> namesWhenTypeEndsAt(std::size_t position) const
+    {
+        std::vector<std::string> left;
+        std::map<NodeType, std::size_t> seen;
+        for (const ScriptedNode& scripted : nodes())
+            if (scripted.type != GetParam() || seen[scripted.type]++ < position)
+                left.push_back(scripted.description);
+        return left;
+    }
+};
+
+TEST_P(HarvestFailureOfType, atSelectionLeavesTheOtherTypes)
+{
+    ScriptedMachine machine(nodes());
+    machine.failSelection(GetParam());
+    const Harvest result = harvest();
+    EXPECT_FALSE(result.nothing);
+    EXPECT_EQ(names(result.sensors), namesWhenTypeEndsAt(0));
+    EXPECT_EQ(result.standardError, Generic);
+}
+
+TEST_P(HarvestFailureOfType, atAPropertyKeepsTheNodesBeforeIt)
+{
+    auto scripted = nodes();
+    for (ScriptedNode& each : scripted)
+        each.failsWhenRead = each.type == GetParam() && each.description.back() == '2';
+    const ScriptedMachine machine(scripted);
+    const Harvest result = harvest();
+    EXPECT_FALSE(result.nothing);
+    EXPECT_EQ(names(result.sensors), namesWhenTypeEndsAt(1));
+    EXPECT_EQ(result.standardError, Generic);
+}
+
+TEST_P(HarvestFailureOfType, byARefusedNameKeepsTheNodesBeforeIt)
+{
+    auto scripted = nodes();
+    for (ScriptedNode& each : scripted)
+        if (each.type == GetParam() && each.description.back() == '3')
+            each.description.clear();
+    const ScriptedMachine machine(scripted);
+    const Harvest result = harvest();
+    EXPECT_FALSE(result.nothing);
+    EXPECT_EQ(names(result.sensors), namesWhenTypeEndsAt(2));
+    EXPECT_EQ(result.standardError, Generic);
+}
+
+TEST_P(HarvestFailureOfType, aloneIsAHarvestOfNothing)
+{
+    ScriptedNode broken = node(GetParam(), "broken");
+    broken.failsWhenRead = true;
+    const ScriptedMachine machine({broken});
+    const Harvest result = harvest();
+    EXPECT_TRUE(result.nothing);
+    EXPECT_TRUE(result.sensors.empty());
+}
+
+INSTANTIATE_TEST_SUITE_P(EveryType, HarvestFailureOfType,
+    ::testing::Values(Temperature, Voltage, Tachometer),
+    [](const auto& test) { return std::to_string(static_cast<unsigned>(test.param)); });
+
+TEST(HarvestFailure, keepsRecordsThoughNoTypeSucceeds)
+{
+    ScriptedNode broken = node(Temperature, "broken");
+    broken.failsWhenRead = true;
+    const ScriptedMachine machine({node(Temperature, "t1"), broken});
+    const Harvest result = harvest();
+    EXPECT_TRUE(result.nothing);
+    EXPECT_THAT(names(result.sensors), ElementsAre("t1"));
+}
+
+TEST(SetVector, throwsTheRefusalAndStaysOnTheNode)
+{
+    const ScriptedMachine machine({{Temperature, "/a", "", NodeReading{}}});
+    Instrumentation instrumentation;
+    instrumentation.selectNode(Temperature);
+    std::vector<Sensor> sensors;
+    try {
+        setVector(sensors, instrumentation);
+        FAIL() << "an empty name was accepted";
+    } catch (const Vorn::ProviderException& refusal) {
+        EXPECT_STREQ(refusal.what(), "Failed while setting Element Name");
+    }
+    EXPECT_TRUE(sensors.empty());
+    ASSERT_TRUE(instrumentation);
+    EXPECT_EQ(instrumentation.getPathToNode(), "/a");
+}
+
+TEST(SetVector, beginsAtTheNodeUnderTheCursor)
+{
+    const ScriptedMachine machine({node(Temperature, "t1"), node(Temperature, "t2")});
+    Instrumentation instrumentation;
+    instrumentation.selectNode(Temperature);
+    ++instrumentation;
+    std::vector<Sensor> sensors;
+    EXPECT_FALSE(setVector(sensors, instrumentation));
+    EXPECT_THAT(names(sensors), ElementsAre("t2"));
+    EXPECT_FALSE(instrumentation);
+}
+
+TEST(CapabilitiesHarvest, appendsOneRecord)
+{
+    std::vector<SensorEnabledLogCap> capabilities;
+    EXPECT_FALSE(getSensorEnabledLogCapInstances(capabilities));
+    EXPECT_EQ(capabilities.size(), 1U);
+    EXPECT_FALSE(getSensorEnabledLogCapInstances(capabilities));
+    EXPECT_EQ(capabilities.size(), 2U);
+}
+
+// ---- Trace lines ----
+
+LogLine mark(const std::string& kind, const std::string& function, unsigned line,
+    const std::string& parameters)
+{
+    return {"log", 3000, "Nimbrel.Sensor", function, "Sensor", line,
+        kind + ": " + function + "() in Sensor [Line: " + std::to_string(line) +
+            "],Parameters List: " + parameters};
+}
+
+TEST(HarvestTrace, aHarvestIsMarkedAndSoIsEveryWalkInIt)
+{
+    const ScriptedMachine machine({node(Temperature, "t1"), node(Tachometer, "f1")});
+    const LogCapture capture;
+    std::vector<Sensor> sensors;
+    getSensorInstances(sensors);
+    const auto lines = capture.log();
+    ASSERT_EQ(lines.size(), 6U);
+    const std::string vector = " vectSensor=" + address(&sensors);
+    EXPECT_EQ(lines[0], mark("ENTERING", "getSensorInstances", 668, vector));
+    const auto cursor = lines[1].text.substr(lines[1].text.find(" instrumentation="));
+    EXPECT_THAT(cursor, ::testing::MatchesRegex(" instrumentation=0x[0-9a-f]+"));
+    EXPECT_EQ(lines[1], mark("ENTERING", "setVector", 740, vector + cursor));
+    EXPECT_EQ(lines[2], mark("EXITING", "setVector", 920, vector + cursor));
+    EXPECT_EQ(lines[3].function, "setVector");
+    EXPECT_EQ(lines[4].line, 920U);
+    EXPECT_EQ(lines[5], mark("EXITING", "getSensorInstances", 732, vector));
+}
+
+TEST(HarvestTrace, aRefusalLeavesTheWalkWithoutItsExitMark)
+{
+    const ScriptedMachine machine({{Temperature, "/a", "", NodeReading{}}});
+    const LogCapture capture;
+    const Harvest result = harvest();
+    std::vector<unsigned> marked;
+    for (const LogLine& line : capture.log())
+        if (line.component == "Nimbrel.Sensor")
+            marked.push_back(line.line);
+    EXPECT_THAT(marked, ElementsAre(668, 740, 732));
+}
+
+TEST(HarvestTrace, theCapabilitiesHarvestIsMarked)
+{
+    const LogCapture capture;
+    std::vector<SensorEnabledLogCap> capabilities;
+    getSensorEnabledLogCapInstances(capabilities);
+    const std::string vector = " vectSensorEnabledLogCap=" + address(&capabilities);
+    EXPECT_THAT(
+        capture.log(), ElementsAre(mark("ENTERING", "getSensorEnabledLogCapInstances", 639, vector),
+                           mark("EXITING", "getSensorEnabledLogCapInstances", 660, vector)));
+}
+
+} // namespace
