@@ -1,0 +1,69 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "factory/BrokerCalls.h"
+
+#include "platform/utilities/ProviderUtilities.h"
+
+#include <cmpimacs.h>
+
+namespace Vorn::SensorProfileProvider {
+
+const char* charactersOf(const CMPIString* string, CMPIStatus* rc)
+{
+    // The slot itself: header sets differ in the convenience function's arguments.
+    return isUsable(string) ? string->ft->getCharPtr(string, rc) : nullptr;
+}
+
+const char* nameSpaceOf(const CMPIObjectPath* path, CMPIStatus* rc)
+{
+    return isUsable(path) ? charactersOf(CMGetNameSpace(path, rc), rc) : nullptr;
+}
+
+const char* classNameOf(const CMPIObjectPath* path, CMPIStatus* rc)
+{
+    return isUsable(path) ? charactersOf(CMGetClassName(path, rc), rc) : nullptr;
+}
+
+CMPIObjectPath* newPath(
+    const CMPIBroker* broker, const CMPIObjectPath* ref, const char* className, CMPIStatus* rc)
+{
+    const char* const nameSpace = nameSpaceOf(ref, rc);
+    if (nameSpace == nullptr)
+        return nullptr;
+    CMPIObjectPath* const path = CMNewObjectPath(broker, nameSpace, className, rc);
+    if (!isUsable(path))
+        return nullptr;
+    copyNameSpace(path, ref, rc);
+    CMSetHostname(path, getSystemName().c_str());
+    return path;
+}
+
+void copyNameSpace(const CMPIObjectPath* path, const CMPIObjectPath* ref, CMPIStatus* rc)
+{
+    if (const char* const nameSpace = nameSpaceOf(ref, rc))
+        CMSetNameSpace(path, nameSpace);
+}
+
+void addTextKey(const CMPIObjectPath* path, const char* name, const char* text)
+{
+    CMAddKey(path, name, text, CMPI_chars);
+}
+
+void traceToBroker(
+    const CMPIBroker* broker, CMPILevel level, const char* component, const char* text)
+{
+    if (broker != nullptr)
+        CMTraceMessage(broker, level, component, text, nullptr);
+}
+
+void reportFailure(const CMPIBroker* broker, CMPIStatus* rc, const char* component,
+    const char* statusText, const char* traceText)
+{
+    if (rc != nullptr) {
+        rc->rc = CMPI_RC_ERR_FAILED;
+        rc->msg = broker != nullptr ? CMNewString(broker, statusText, nullptr) : nullptr;
+    }
+    traceToBroker(broker, CMPI_LEV_WARNING, component, traceText);
+}
+
+} // namespace Vorn::SensorProfileProvider

@@ -1,0 +1,217 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// From a sensor record to an instance of ZUMLO_NumericSensor.
+
+#include "factory/BrokerCalls.h"
+#include "factory/ClassNames.h"
+#include "factory/FactoryModule.h"
+#include "factory/InstanceWriter.h"
+#include "factory/PropertySelection.h"
+#include "factory/SensorFactory.h"
+#include "platform/locale/Locale.h"
+#include "platform/locale/ResourceString.h"
+#include "platform/locale/formatText.h"
+#include "platform/utilities/ProviderUtilities.h"
+
+#include <cmpimacs.h>
+
+#include <optional>
+
+namespace Vorn::SensorProfileProvider {
+
+namespace {
+
+constexpr const char* Function = "makeSensorInstance";
+
+// The number by which the message catalogs know this library.
+constexpr unsigned long ResourceComponent = 2;
+
+// Captions and descriptions are cut to one character less than this.
+constexpr std::size_t LocalisedTextSize = 512;
+
+std::string localised(const wchar_t* messageId, const std::string& elementName)
+{
+    const std::wstring library =
+        Locale::getResourceLibrary(ResourceComponent, Locale::getLanguageId());
+    const ResourceString resource(library, messageId);
+    return make_string(formatText(resource.text(), elementName, LocalisedTextSize));
+}
+
+// The instance with its filter and keys. Null, or the handle-less instance the broker returned,
+// when there is none to go on with.
+CMPIInstance* newSensorInstance(const CMPIBroker* broker, const CMPIObjectPath* ref,
+    const Sensor& sensor, const char** properties)
+{
+    const CMPIObjectPath* const path = newPath(broker, ref, SensorClass, nullptr);
+    if (path == nullptr)
+        return nullptr;
+    CMPIInstance* const instance = CMNewInstance(broker, path, nullptr);
+    if (!isUsable(instance))
+        return instance;
+    const char* keys[] = {
+        "CreationClassName", "DeviceID", "SystemCreationClassName", "SystemName", nullptr};
+    CMSetPropertyFilter(instance, properties, keys);
+    const InstanceWriter writer(broker, instance);
+    writer.setText("CreationClassName", SensorClass);
+    writer.setText("DeviceID", sensor.getDeviceID());
+    writer.setText("SystemCreationClassName", ComputerSystemClass);
+    writer.setText("SystemName", getSystemName());
+    return instance;
+}
+
+// What an array that the broker cannot make is reported with.
+struct ArrayFailure {
+    const char* statusText;
+    const char* traceText;
+    std::optional<unsigned> exitingLine; // absent where the exiting line is left out
+};
+
+// The runs of blanks are part of the texts.
+constexpr const char* SupportedThresholdsFailed =
+    "Create Array for Property                         SupportedThresholds failed.";
+constexpr const char* SettableThresholdsFailed =
+    "Create Array for Property                         SettableThresholds failed.";
+constexpr const char* OperationalStatusFailed =
+    "Create Array for Property                         OperationalStatus failed.";
+constexpr const char* OperationalStatusFailedTrace =
+    "Create Array for Property Operat                        ionalStatus failed.";
+
+// Sets the selected properties of one instance in their order.
+class SensorProperties {
+public:
+    SensorProperties(Sensor& sensor, const PropertySelection& selection,
+        const InstanceWriter& writer, CMPIStatus* rc)
+        : sensor_(sensor), selection_(selection), writer_(writer), rc_(rc)
+    {
+    }
+
+    // The failure that ended the build, if one did.
+    std::optional<ArrayFailure> set()
+    {
+        setNames();
+        setPossibleStates();
+        setCode("BaseUnits", sensor_.getBaseUnits());
+        setCode("RateUnits", sensor_.getRateUnits());
+        if (!setCodes("SupportedThresholds", sensor_.getSupportedThresholds()))
+            return ArrayFailure{SupportedThresholdsFailed, SupportedThresholdsFailed, {}};
+        if (!setCodes("SettableThresholds", sensor_.getSettableThresholds()))
+            return ArrayFailure{SettableThresholdsFailed, SettableThresholdsFailed, {}};
+        setStates();
+        if (!setCodes("OperationalStatus", sensor_.getOperationalStatus()))
+            return ArrayFailure{OperationalStatusFailed, OperationalStatusFailedTrace, 615};
+        setMeasurements();
+        return std::nullopt;
+    }
+
+private:
+    void setNames() const
+    {
+        const std::string name = sensor_.getElementName();
+        if (selection_.wants("Caption"))
+            writer_.setText("Caption", localised(L"MSGID_SENSOR_CAPTION", name));
+        if (selection_.wants("Description"))
+            writer_.setText("Description", localised(L"MSGID_SENSOR_DESCRIPTION", name));
+        setText("Name", name);
+        setText("ElementName", name);
+        setText("CurrentState", sensor_.getCurrentState());
+    }
+
+    void setPossibleStates() const
+    {
+        if (!selection_.wants("PossibleStates"))
+            return;
+        const std::vector<std::string> states = sensor_.getPossibleStates();
+        if (static_cast<std::uint16_t>(states.size()) == 0)
+            return; // unlike a list of codes, an empty list of labels is not published
+        if (!writer_.setTexts("PossibleStates", states, rc_))
+            traceMessage(
+                factoryModule(), Function, 440, "Failed to create CMPIArray for PossibleStates");
+    }
+
+    void setStates() const
+    {
+        setCode("SensorType", sensor_.getSensorType());
+        setCode("EnabledState", sensor_.getEnabledState());
+        setCode("RequestedState", sensor_.getRequestedState());
+        if (selection_.wants("HealthState")) {
+            writer_.setCode("HealthState", sensor_.getHealthState());
+            writer_.setText("Status", sensor_.getHealthStatus()); // never without HealthState
+        }
+    }
+
+    void setMeasurements() const
+    {
+        setNumber("CurrentReading", sensor_.getCurrentReading());
+        setNumber("UnitModifier", sensor_.getUnitModifier());
+        setThreshold("LowerThresholdNonCritical", sensor_.getLowerThresholdNonCritical());
+        setThreshold("UpperThresholdNonCritical", sensor_.getUpperThresholdNonCritical());
+        setThreshold("LowerThresholdCritical", sensor_.getLowerThresholdCritical());
+        setThreshold("UpperThresholdCritical", sensor_.getUpperThresholdCritical());
+        setThreshold("LowerThresholdFatal", sensor_.getLowerThresholdFatal());
+        setThreshold("UpperThresholdFatal", sensor_.getUpperThresholdFatal());
+    }
+
+    void setText(const char* name, const std::string& text) const
+    {
+        if (selection_.wants(name))
+            writer_.setText(name, text);
+    }
+
+    void setCode(const char* name, std::uint16_t code) const
+    {
+        if (selection_.wants(name))
+            writer_.setCode(name, code);
+    }
+
+    void setNumber(const char* name, std::int32_t number) const
+    {
+        if (selection_.wants(name))
+            writer_.setNumber(name, number);
+    }
+
+    // 0 means that the sensor has no such threshold.
+    void setThreshold(const char* name, std::int32_t threshold) const
+    {
+        if (threshold != 0)
+            setNumber(name, threshold);
+    }
+
+    bool setCodes(const char* name, const std::vector<std::uint16_t>& codes) const
+    {
+        return !selection_.wants(name) || writer_.setCodes(name, codes, rc_);
+    }
+
+    Sensor& sensor_;
+    const PropertySelection& selection_;
+    const InstanceWriter& writer_;
+    CMPIStatus* rc_;
+};
+
+} // namespace
+
+CMPIInstance* SensorFactory::makeSensorInstance(const CMPIBroker* broker, const CMPIObjectPath* ref,
+    Sensor snsr, const char** properties, bool isObjPath, CMPIStatus* rc)
+{
+    const TracedOperation traced(factoryModule(), Function, [&] {
+        return parameterList(" broker=", broker, " ref=", ref, " snsr=", &snsr,
+            " properties=", properties, " isObjPath=", isObjPath, " rc=", rc);
+    });
+    traced.entering(269);
+    const PropertySelection selection(properties, isObjPath);
+    CMPIInstance* const instance = newSensorInstance(broker, ref, snsr, properties);
+    if (isUsable(instance)) {
+        const InstanceWriter writer(broker, instance);
+        const auto failure = SensorProperties(snsr, selection, writer, rc).set();
+        if (failure) {
+            reportFailure(
+                broker, rc, SensorProfileProvider, failure->statusText, failure->traceText);
+            if (failure->exitingLine)
+                traced.exiting(*failure->exitingLine);
+            return instance;
+        }
+    }
+    traced.exiting(737);
+    return instance;
+}
+
+} // namespace Vorn::SensorProfileProvider

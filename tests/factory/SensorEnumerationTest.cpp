@@ -1,0 +1,203 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// The factory's sensors as instances and object paths.
+
+#include "factory/SensorFactory.h"
+#include "tests/support/ProviderTest.h"
+
+#include <gmock/gmock.h>
+
+namespace {
+
+using namespace Vorn::SensorProfileProvider;
+using Testing::BrokerMessage;
+using Testing::describe;
+using ::testing::ElementsAre;
+using Testing::LogCapture;
+using Testing::property;
+using Testing::ProviderTest;
+using Testing::ScriptedMachine;
+using Testing::ScriptedNode;
+using Vorn::NodeReading;
+using Vorn::NodeLexicon::NodeType;
+
+// Harvested as Z, X, Y.
+const std::vector<ScriptedNode> Unsorted = {{NodeType::Temperature, "/p", "Z", NodeReading{}},
+    {NodeType::Voltage, "/p", "X", NodeReading{}},
+    {NodeType::Tachometer, "/p", "Y", NodeReading{}}};
+
+class SensorEnumerationTest : public ProviderTest {
+protected:
+    explicit SensorEnumerationTest(std::vector<ScriptedNode> nodes = Unsorted)
+        : machine_(std::move(nodes)), factory_(true, false)
+    {
+    }
+
+    int getOne(const char* deviceID)
+    {
+        return factory_.getOneSensorCMPIInstance(broker(), path("C").handle(),
+            Host::String::make(request_->arena(), deviceID).handle(), nullptr, instances_, &rc_);
+    }
+
+    ScriptedMachine machine_;
+    SensorFactory factory_;
+    std::vector<CMPIInstance*> instances_;
+    std::vector<CMPIObjectPath*> paths_;
+    CMPIStatus rc_ = {CMPI_RC_OK, nullptr};
+};
+
+class EmptyMachineTest : public SensorEnumerationTest {
+protected:
+    EmptyMachineTest() : SensorEnumerationTest({}) {}
+};
+
+TEST_F(SensorEnumerationTest, instancesComeInTheOrderOfTheirIdentifiers)
+{
+    EXPECT_EQ(factory_.getAllSensorCMPIInstances(
+                  broker(), path("C").handle(), nullptr, false, instances_, &rc_),
+        0);
+    std::vector<std::string> identifiers;
+    for (const CMPIInstance* const instance : instances_)
+        identifiers.push_back(property(*Host::Instance::of(instance), "DeviceID"));
+    EXPECT_THAT(identifiers, ElementsAre("string \"X:/p\"", "string \"Y:/p\"", "string \"Z:/p\""));
+    EXPECT_EQ(rc_.rc, CMPI_RC_OK);
+}
+
+TEST_F(SensorEnumerationTest, instancesForObjectPathsHaveTheKeysAlone)
+{
+    factory_.getAllSensorCMPIInstances(
+        broker(), path("C").handle(), nullptr, true, instances_, &rc_);
+    ASSERT_EQ(instances_.size(), 3U);
+    EXPECT_EQ(Host::Instance::of(instances_[0])->properties().size(), 4U);
+}
+
+TEST_F(SensorEnumerationTest, whatIsThereStaysInTheVector)
+{
+    instances_.push_back(nullptr);
+    factory_.getAllSensorCMPIInstances(
+        broker(), path("C").handle(), nullptr, false, instances_, &rc_);
+    EXPECT_EQ(instances_.size(), 4U);
+    EXPECT_EQ(instances_[0], nullptr);
+}
+
+TEST_F(EmptyMachineTest, hasNoInstancesAndThatIsNoFailure)
+{
+    EXPECT_EQ(factory_.getAllSensorCMPIInstances(
+                  broker(), path("C").handle(), nullptr, false, instances_, &rc_),
+        0);
+    EXPECT_TRUE(instances_.empty());
+    EXPECT_TRUE(messages_.empty());
+}
+
+TEST_F(SensorEnumerationTest, oneInstanceIsFoundByItsWholeIdentifier)
+{
+    EXPECT_EQ(getOne("Y:/p"), 0);
+    ASSERT_EQ(instances_.size(), 1U);
+    EXPECT_EQ(property(*Host::Instance::of(instances_[0]), "ElementName"), "string \"Y\"");
+}
+
+TEST_F(SensorEnumerationTest, anIdentifierIsNeitherFoldedNorTrimmed)
+{
+    for (const char* const other : {"y:/p", "Y:/P", " Y:/p", "Y:/p ", "Y:/", "Y:/p2", ""})
+        EXPECT_EQ(getOne(other), 1) << other;
+    EXPECT_TRUE(instances_.empty());
+    EXPECT_EQ(rc_.rc, CMPI_RC_OK);
+    EXPECT_TRUE(messages_.empty());
+}
+
+TEST_F(SensorEnumerationTest, anAbsentKeyFindsNothing)
+{
+    EXPECT_EQ(factory_.getOneSensorCMPIInstance(
+                  broker(), path("C").handle(), nullptr, nullptr, instances_, &rc_),
+        1);
+}
+
+TEST_F(SensorEnumerationTest, anObjectPathHasTheFourKeysInOrder)
+{
+    EXPECT_EQ(factory_.getAllSensorCMPIObjPaths(
+                  broker(), path("C", {}, "root/other").handle(), paths_, &rc_),
+        0);
+    ASSERT_EQ(paths_.size(), 3U);
+    const Host::ObjectPath& first = *Host::ObjectPath::of(paths_[0]);
+    EXPECT_THAT(
+        describe(first.keys()), ElementsAre("CreationClassName = string \"ZUMLO_NumericSensor\"",
+                                    "DeviceID = string \"X:/p\"",
+                                    "SystemCreationClassName = string \"ZUMLO_ComputerSystem\"",
+                                    "SystemName = string \"" + systemName_ + "\""));
+    EXPECT_EQ(first.className(), "ZUMLO_NumericSensor");
+    EXPECT_EQ(first.nameSpace(), "root/other");
+    EXPECT_EQ(first.host(), systemName_);
+    EXPECT_EQ(Host::ObjectPath::of(paths_[1])->key("DeviceID")->text(), "Y:/p");
+    EXPECT_EQ(Host::ObjectPath::of(paths_[2])->key("DeviceID")->text(), "Z:/p");
+    EXPECT_EQ(rc_.rc, CMPI_RC_OK);
+}
+
+TEST_F(EmptyMachineTest, hasNoObjectPathsAndSaysSoToTheBroker)
+{
+    EXPECT_EQ(factory_.getAllSensorCMPIObjPaths(broker(), path("C").handle(), paths_, &rc_), 1);
+    EXPECT_TRUE(paths_.empty());
+    EXPECT_EQ(rc_.rc, CMPI_RC_OK);
+    EXPECT_THAT(messages_,
+        ElementsAre(BrokerMessage{1, "SensorProfileProvider", "***No instance found***"}));
+}
+
+// ---- Trace lines; those of the instances made on the way are left out ----
+
+std::vector<std::string> linesOf(const LogCapture& capture, const std::string& function)
+{
+    std::vector<std::string> found;
+    for (const Testing::LogLine& line : capture.log())
+        if (line.function == function) {
+            const std::string text = Testing::withoutPointers(line);
+            found.push_back(text.substr(text.find(") ") + 2, 13) +
+                            text.substr(std::min(text.size(), text.find(",Parameters"))));
+        }
+    return found;
+}
+
+TEST_F(SensorEnumerationTest, allInstancesAreTracedWithAnUnseparatedLastLabel)
+{
+    const LogCapture capture;
+    factory_.getAllSensorCMPIInstances(
+        broker(), path("C").handle(), nullptr, false, instances_, &rc_);
+    const std::string parameters = ",Parameters List:  broker=PTR ref=PTR properties=0 isObjPath=0 "
+                                   "instances=PTRrc=PTR";
+    EXPECT_THAT(linesOf(capture, "getAllSensorCMPIInstances"),
+        ElementsAre("3000 ENTERING" + parameters, "3000 EXITING:" + parameters));
+}
+
+TEST_F(SensorEnumerationTest, oneInstanceIsTraced)
+{
+    const LogCapture capture;
+    getOne("X:/p");
+    const std::string parameters =
+        ",Parameters List:  broker=PTR ref=PTR key=PTR properties=0 instances=PTR rc=PTR";
+    EXPECT_THAT(linesOf(capture, "getOneSensorCMPIInstance"),
+        ElementsAre("3000 ENTERING" + parameters, "3000 EXITING:" + parameters));
+}
+
+TEST_F(SensorEnumerationTest, anUnknownIdentifierLeavesTheExitingLineOut)
+{
+    const LogCapture capture;
+    getOne("unknown");
+    EXPECT_EQ(linesOf(capture, "getOneSensorCMPIInstance").size(), 1U);
+}
+
+TEST_F(SensorEnumerationTest, objectPathsAreTraced)
+{
+    const LogCapture capture;
+    factory_.getAllSensorCMPIObjPaths(broker(), path("C").handle(), paths_, &rc_);
+    const std::string parameters =
+        ",Parameters List:  broker=PTR ref=PTR objectPaths=PTR status=PTR";
+    EXPECT_THAT(linesOf(capture, "getAllSensorCMPIObjPaths"),
+        ElementsAre("3000 ENTERING" + parameters, "3000 EXITING:" + parameters));
+}
+
+TEST_F(EmptyMachineTest, hasItsObjectPathsTracedToo)
+{
+    const LogCapture capture;
+    factory_.getAllSensorCMPIObjPaths(broker(), path("C").handle(), paths_, &rc_);
+    EXPECT_EQ(linesOf(capture, "getAllSensorCMPIObjPaths").size(), 2U);
+}
+
+} // namespace

@@ -1,0 +1,141 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// The factory's life: what it harvests, how it counts and what it traces.
+
+#include "factory/SensorFactory.h"
+
+#include "tests/support/LogCapture.h"
+#include "tests/support/ProviderTest.h"
+
+#include <gmock/gmock.h>
+
+namespace {
+
+using namespace Vorn::SensorProfileProvider;
+using ::testing::ElementsAre;
+using Testing::LogCapture;
+using Testing::LogLine;
+using Testing::ScriptedMachine;
+using Testing::ScriptedNode;
+using Vorn::NodeReading;
+using Vorn::NodeLexicon::NodeType;
+
+const std::vector<ScriptedNode> TwoSensors = {{NodeType::Temperature, "/t", "t", NodeReading{}},
+    {NodeType::Tachometer, "/f", "f", NodeReading{}}};
+
+std::vector<std::string> factoryLines(const LogCapture& capture)
+{
+    std::vector<std::string> found;
+    for (const LogLine& line : capture.log())
+        if (line.component == "Nimbrel.SensorFactory")
+            found.push_back(std::to_string(line.level) + " " + line.file + " " +
+                            line.text.substr(0, line.text.find(" [Line:")) +
+                            (line.text.find(",Parameters") == std::string::npos
+                                    ? ""
+                                    : line.text.substr(line.text.find(",Parameters"))));
+    return found;
+}
+
+TEST(SensorFactory, withoutFlagsHarvestsNothing)
+{
+    const ScriptedMachine machine(TwoSensors);
+    EXPECT_EQ(SensorFactory().getNumberOfInstances(), 0);
+    EXPECT_EQ(SensorFactory(false, false).getNumberOfInstances(), 0);
+}
+
+TEST(SensorFactory, countsSensorsAndNotCapabilities)
+{
+    const ScriptedMachine machine(TwoSensors);
+    EXPECT_EQ(SensorFactory(true, false).getNumberOfInstances(), 2);
+    EXPECT_EQ(SensorFactory(true, true).getNumberOfInstances(), 2);
+    EXPECT_EQ(SensorFactory(false, true).getNumberOfInstances(), 0);
+}
+
+TEST(SensorFactory, countsSensorsOfOneIdentifierOnce)
+{
+    const ScriptedMachine machine({{NodeType::Temperature, "/same", "t", NodeReading{}},
+        {NodeType::Voltage, "/same", "t", NodeReading{}}});
+    EXPECT_EQ(SensorFactory(true, false).getNumberOfInstances(), 1);
+}
+
+TEST(SensorFactory, ofAFailedHarvestHasNoSensorsThoughRecordsWereAppended)
+{
+    ScriptedNode broken = {NodeType::Temperature, "/b", "b", NodeReading{}};
+    broken.failsWhenRead = true;
+    const ScriptedMachine machine({{NodeType::Temperature, "/t", "t", NodeReading{}}, broken});
+    ::testing::internal::CaptureStderr();
+    SensorFactory factory(true, false);
+    ::testing::internal::GetCapturedStderr();
+    EXPECT_EQ(factory.getNumberOfInstances(), 0);
+}
+
+TEST(SensorFactory, cutsItsCountTo16Bits)
+{
+    std::vector<ScriptedNode> nodes(65537, {NodeType::Temperature, "", "sensor", NodeReading{}});
+    for (std::size_t i = 0; i < nodes.size(); ++i)
+        nodes[i].path = "/" + std::to_string(i);
+    const ScriptedMachine machine(nodes);
+    EXPECT_EQ(SensorFactory(true, false).getNumberOfInstances(), 1);
+}
+
+TEST(SensorFactoryTrace, theDefaultConstructorAndTheDestructorWriteNothing)
+{
+    const LogCapture capture;
+    {
+        SensorFactory factory;
+    }
+    EXPECT_TRUE(capture.log().empty());
+}
+
+TEST(SensorFactoryTrace, theRequestConstructorTracesItsFlagsAndItsMaps)
+{
+    const ScriptedMachine machine(TwoSensors);
+    const LogCapture capture;
+    SensorFactory factory(true, true);
+    EXPECT_THAT(factoryLines(capture),
+        ElementsAre("3000 SensorFactory ENTERING: SensorFactory() in SensorFactory,Parameters "
+                    "List:  isSen=1 isCap=1",
+            "4000 SensorFactory ENTERING: _createSensorMap() in SensorFactory",
+            "4000 SensorFactory EXITING: _createSensorMap() in SensorFactory",
+            "4000 SensorFactory ENTERING: _createEnabledLogicalElementCapMap() in SensorFactory",
+            "4000 SensorFactory EXITING: _createEnabledLogicalElementCapMap() in SensorFactory",
+            "3000 SensorFactory EXITING: SensorFactory() in SensorFactory,Parameters List:  "
+            "isSen=1 isCap=1"));
+}
+
+TEST(SensorFactoryTrace, aFailedHarvestBuildsNoMap)
+{
+    const ScriptedMachine machine;
+    const LogCapture capture;
+    SensorFactory factory(true, false);
+    EXPECT_THAT(factoryLines(capture),
+        ElementsAre("3000 SensorFactory ENTERING: SensorFactory() in SensorFactory,Parameters "
+                    "List:  isSen=1 isCap=0",
+            "3000 SensorFactory EXITING: SensorFactory() in SensorFactory,Parameters List:  "
+            "isSen=1 isCap=0"));
+}
+
+TEST(SensorFactoryTrace, countingIsMarkedWithoutParameters)
+{
+    SensorFactory factory;
+    const LogCapture capture;
+    factory.getNumberOfInstances();
+    EXPECT_THAT(factoryLines(capture),
+        ElementsAre("4000 SensorFactory ENTERING: getNumberOfInstances() in SensorFactory",
+            "4000 SensorFactory EXITING: getNumberOfInstances() in SensorFactory"));
+}
+
+TEST(SensorFactoryTrace, sensorsAreHarvestedBeforeCapabilities)
+{
+    const ScriptedMachine machine(TwoSensors);
+    const LogCapture capture;
+    SensorFactory factory(true, true);
+    std::vector<std::string> functions;
+    for (const LogLine& line : capture.log())
+        if (line.component == "Nimbrel.Sensor" && line.text.starts_with("ENTERING"))
+            functions.push_back(line.function);
+    EXPECT_THAT(functions, ElementsAre("getSensorInstances", "setVector", "setVector",
+                               "getSensorEnabledLogCapInstances"));
+}
+
+} // namespace

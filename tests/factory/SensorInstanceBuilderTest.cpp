@@ -1,0 +1,260 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// From a sensor record to an instance: which properties, of which types, with which values.
+
+#include "factory/SensorFactory.h"
+#include "tests/support/ProviderTest.h"
+
+#include <gmock/gmock.h>
+
+namespace {
+
+using namespace Vorn::SensorProfileProvider;
+using ::testing::Contains;
+using Testing::describe;
+using ::testing::ElementsAre;
+using Testing::LogCapture;
+using Testing::namesOf;
+using ::testing::Not;
+using Testing::property;
+using Testing::ProviderTest;
+
+class SensorInstanceBuilderTest : public ProviderTest {
+protected:
+    static Sensor fullSensor()
+    {
+        Sensor sensor;
+        sensor.setDeviceID("CPU 1 Vcore:/board/in1");
+        sensor.setElementName("CPU 1 Vcore");
+        sensor.setSensorType(21);
+        sensor.setCurrentState(23);
+        sensor.setEnabledState(1);
+        sensor.setOperationalStatus(1);
+        sensor.setHealthState(23);
+        sensor.setRequestedState(1);
+        sensor.setPossibleStates({1, 23});
+        sensor.setCurrentReading(1.25);
+        sensor.setLowerThresholdNonCritical(0.9);
+        sensor.setUpperThresholdNonCritical(1.2);
+        sensor.setLowerThresholdCritical(0.8);
+        sensor.setUpperThresholdCritical(1.5);
+        sensor.setLowerThresholdFatal(0.5);
+        sensor.setUpperThresholdFatal(1.75);
+        sensor.setBaseUnits(5);
+        return sensor;
+    }
+
+    const Host::Instance& make(
+        const Sensor& sensor, const char** properties = nullptr, bool isObjPath = false)
+    {
+        SensorFactory factory;
+        CMPIInstance* const made = factory.makeSensorInstance(
+            broker(), path("ANY_Class").handle(), sensor, properties, isObjPath, &rc_);
+        const Host::Instance* const instance = Host::Instance::of(made);
+        if (instance == nullptr)
+            throw std::runtime_error("no instance was made");
+        return *instance;
+    }
+
+    std::vector<std::string> keys() const
+    {
+        return {"CreationClassName", "DeviceID", "SystemCreationClassName", "SystemName"};
+    }
+
+    std::vector<std::string> namesWith(std::vector<const char*> properties, bool isObjPath = false)
+    {
+        properties.push_back(nullptr);
+        return namesOf(make(fullSensor(), properties.data(), isObjPath).properties());
+    }
+
+    std::vector<std::string> keysAnd(std::vector<std::string> names) const
+    {
+        auto all = keys();
+        all.insert(all.end(), names.begin(), names.end());
+        return all;
+    }
+
+    CMPIStatus rc_ = {CMPI_RC_OK, nullptr};
+};
+
+TEST_F(SensorInstanceBuilderTest, aFullSensorHasAllPropertiesInOrder)
+{
+    EXPECT_THAT(describe(make(fullSensor()).properties()),
+        ElementsAre("CreationClassName = string \"ZUMLO_NumericSensor\"",
+            "DeviceID = string \"CPU 1 Vcore:/board/in1\"",
+            "SystemCreationClassName = string \"ZUMLO_ComputerSystem\"",
+            "SystemName = string \"" + systemName_ + "\"",
+            ::testing::ContainsRegex("^Caption = string \".*CPU 1 Vcore.*\"$"),
+            ::testing::ContainsRegex("^Description = string \".*CPU 1 Vcore.*\"$"),
+            "Name = string \"CPU 1 Vcore\"", "ElementName = string \"CPU 1 Vcore\"",
+            "CurrentState = string \"WarningHigh\"",
+            "PossibleStates = [string \"Normal\", string \"WarningHigh\", string \"Normal\", "
+            "string \"Warning\", string \"Non-Critical\", string \"Lower Non-Critical\", string "
+            "\"Upper Non-Critical\", string \"Critical\", string \"Lower Critical\", string "
+            "\"Upper Critical\", string \"Fatal\", string \"Lower Fatal\", string \"Upper "
+            "Fatal\", string \"Unknown\"]",
+            "BaseUnits = uint16 5", "RateUnits = uint16 0",
+            "SupportedThresholds = [uint16 0, uint16 1, uint16 2, uint16 3, uint16 4, uint16 5]",
+            "SettableThresholds = [uint16 0, uint16 1, uint16 2, uint16 3, uint16 4, uint16 5]",
+            "SensorType = uint16 3", "EnabledState = uint16 2", "RequestedState = uint16 2",
+            "HealthState = uint16 10", "Status = string \"Error\"",
+            "OperationalStatus = [uint16 2]", "CurrentReading = sint32 1250",
+            "UnitModifier = sint32 -3", "LowerThresholdNonCritical = sint32 900",
+            "UpperThresholdNonCritical = sint32 1199", "LowerThresholdCritical = sint32 800",
+            "UpperThresholdCritical = sint32 1500", "LowerThresholdFatal = sint32 500",
+            "UpperThresholdFatal = sint32 1750"));
+    EXPECT_EQ(rc_.rc, CMPI_RC_OK);
+    EXPECT_TRUE(messages_.empty());
+}
+
+TEST_F(SensorInstanceBuilderTest, captionAndDescriptionDiffer)
+{
+    const Host::Instance& instance = make(fullSensor());
+    EXPECT_NE(property(instance, "Caption"), property(instance, "Description"));
+}
+
+TEST_F(SensorInstanceBuilderTest, anEmptyRecordPublishesItsDefaults)
+{
+    const Host::Instance& instance = make(Sensor());
+    EXPECT_EQ(property(instance, "CurrentState"), "string \"\"");
+    EXPECT_EQ(property(instance, "HealthState"), "uint16 0");
+    EXPECT_EQ(property(instance, "Status"), "string \"\"");
+    EXPECT_EQ(property(instance, "EnabledState"), "uint16 0");
+    EXPECT_EQ(property(instance, "OperationalStatus"), "[]");
+    EXPECT_EQ(property(instance, "CurrentReading"), "sint32 0");
+    EXPECT_EQ(property(instance, "UnitModifier"), "sint32 0");
+    EXPECT_EQ(instance.property("PossibleStates")->array()->elements().size(), 12U);
+    for (const char* const threshold :
+        {"LowerThresholdNonCritical", "UpperThresholdNonCritical", "LowerThresholdCritical",
+            "UpperThresholdCritical", "LowerThresholdFatal", "UpperThresholdFatal"})
+        EXPECT_EQ(property(instance, threshold), "absent") << threshold;
+}
+
+TEST_F(SensorInstanceBuilderTest, aThresholdThatScalesToZeroIsLeftOut)
+{
+    Sensor sensor = fullSensor();
+    sensor.setUpperThresholdFatal(0.0004);
+    EXPECT_EQ(property(make(sensor), "UpperThresholdFatal"), "absent");
+}
+
+TEST_F(SensorInstanceBuilderTest, theStoredRecordIsUntouched)
+{
+    Sensor sensor = fullSensor();
+    make(sensor);
+    EXPECT_EQ(sensor.getSupportedThresholds().size(), 6U);
+    EXPECT_EQ(sensor.getPossibleStates().size(), 14U);
+}
+
+TEST_F(SensorInstanceBuilderTest, anObjectPathNeedsTheKeysAlone)
+{
+    EXPECT_EQ(namesOf(make(fullSensor(), nullptr, true).properties()), keys());
+}
+
+TEST_F(SensorInstanceBuilderTest, aPropertyListDecidesWhateverTheObjectPathFlagSays)
+{
+    EXPECT_EQ(namesWith({"Name"}, true), keysAnd({"Name"}));
+    EXPECT_EQ(namesWith({"Name"}, false), keysAnd({"Name"}));
+}
+
+TEST_F(SensorInstanceBuilderTest, anEmptyListSelectsTheKeysAlone)
+{
+    EXPECT_EQ(namesWith({}), keys());
+}
+
+TEST_F(SensorInstanceBuilderTest, eachPropertyIsSelectedByItsName)
+{
+    for (const char* const name :
+        {"Caption", "Description", "Name", "ElementName", "CurrentState", "PossibleStates",
+            "BaseUnits", "RateUnits", "SupportedThresholds", "SettableThresholds", "SensorType",
+            "EnabledState", "RequestedState", "OperationalStatus", "CurrentReading", "UnitModifier",
+            "LowerThresholdNonCritical", "UpperThresholdNonCritical", "LowerThresholdCritical",
+            "UpperThresholdCritical", "LowerThresholdFatal", "UpperThresholdFatal"})
+        EXPECT_EQ(namesWith({name}), keysAnd({name}));
+}
+
+// The broker's filter holds the list as well: Status is dropped there unless it is listed.
+TEST_F(SensorInstanceBuilderTest, statusTravelsWithHealthState)
+{
+    EXPECT_EQ(namesWith({"Status"}), keys());
+    EXPECT_EQ(namesWith({"HealthState", "Status"}), keysAnd({"HealthState", "Status"}));
+}
+
+TEST_F(SensorInstanceBuilderTest, namesAreComparedLetterForLetter)
+{
+    EXPECT_EQ(namesWith({"healthstate"}), keys());
+}
+
+TEST_F(SensorInstanceBuilderTest, keysAreSetAlsoWhenTheyAreListed)
+{
+    EXPECT_EQ(namesWith({"DeviceID", "Name"}), keysAnd({"Name"}));
+}
+
+TEST_F(SensorInstanceBuilderTest, thePathHasTheRequestsNamespaceAndThisSystemAsHost)
+{
+    SensorFactory factory;
+    const Host::ObjectPath& ref = path("ANY_Class", {}, "root/other");
+    const Host::Instance* const instance = Host::Instance::of(
+        factory.makeSensorInstance(broker(), ref.handle(), fullSensor(), nullptr, false, &rc_));
+    ASSERT_NE(instance, nullptr);
+    const Host::ObjectPath& made = instance->objectPath();
+    EXPECT_EQ(made.nameSpace(), "root/other");
+    EXPECT_EQ(made.host(), systemName_);
+    EXPECT_EQ(made.className(), "ZUMLO_NumericSensor");
+    EXPECT_EQ(namesOf(made.keys()), keys());
+}
+
+TEST_F(SensorInstanceBuilderTest, aUtf8NameComesOutWholeInCaptionAndDescription)
+{
+    Sensor sensor = fullSensor();
+    sensor.setElementName("Lüfter №1 — 風扇 🌀");
+    const Host::Instance& instance = make(sensor);
+    EXPECT_THAT(property(instance, "Caption"), ::testing::HasSubstr("Lüfter №1 — 風扇 🌀"));
+    EXPECT_THAT(property(instance, "Description"), ::testing::HasSubstr("Lüfter №1 — 風扇 🌀"));
+}
+
+TEST_F(SensorInstanceBuilderTest, aNameThatLooksLikeAFormatIsTakenAsItIs)
+{
+    Sensor sensor = fullSensor();
+    sensor.setElementName("100%s%n %d");
+    EXPECT_THAT(property(make(sensor), "Caption"), ::testing::HasSubstr("100%s%n %d"));
+}
+
+TEST_F(SensorInstanceBuilderTest, aLongNameIsCutInCaptionButNotInName)
+{
+    Sensor sensor = fullSensor();
+    std::string name;
+    for (int i = 0; i < 600; ++i)
+        name += "ü";
+    sensor.setElementName(name);
+    const Host::Instance& instance = make(sensor);
+    const std::string caption = property(instance, "Caption");
+    EXPECT_LE(caption.size(), 2 * 511U + 16U);
+    EXPECT_EQ(caption.substr(caption.size() - 3), "ü\"");
+    EXPECT_EQ(property(instance, "Name"), "string \"" + name + "\"");
+}
+
+TEST_F(SensorInstanceBuilderTest, exactlyAFull16BitCountOfLabelsIsNoProperty)
+{
+    Sensor sensor = fullSensor();
+    sensor.setPossibleStates(std::vector<unsigned>(65536 - 12, 1));
+    EXPECT_EQ(property(make(sensor), "PossibleStates"), "absent");
+    sensor.setPossibleStates(std::vector<unsigned>(65536 - 12 + 2, 1));
+    EXPECT_EQ(property(make(sensor), "PossibleStates"), "[string \"Normal\", string \"Normal\"]");
+}
+
+TEST_F(SensorInstanceBuilderTest, isTracedWithItsParameters)
+{
+    const LogCapture capture;
+    make(fullSensor());
+    const std::string parameters =
+        ",Parameters List:  broker=PTR ref=PTR snsr=PTR properties=0 isObjPath=0 rc=PTR";
+    EXPECT_THAT(Testing::withoutPointers(capture.log()),
+        ElementsAre("makeSensorInstance(SensorFactory:269) 3000 ENTERING: makeSensorInstance() in "
+                    "SensorFactory [Line: 269]" +
+                        parameters,
+            "makeSensorInstance(SensorFactory:737) 3000 EXITING: makeSensorInstance() in "
+            "SensorFactory [Line: 737]" +
+                parameters));
+}
+
+} // namespace
