@@ -1,0 +1,167 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// The six factories, their tables, and the handlers that do nothing.
+
+#include "tests/providers/Factories.h"
+#include "tests/support/LogCapture.h"
+
+#include <gtest/gtest.h>
+
+#include <string>
+
+namespace {
+
+using InstanceFactory = CMPIInstanceMI* (*)(const CMPIBroker*, const CMPIContext*, CMPIStatus*);
+using AssociationFactory = CMPIAssociationMI* (*)(const CMPIBroker*, const CMPIContext*,
+    CMPIStatus*);
+
+struct InstanceEntry {
+    const char* miName;
+    InstanceFactory factory;
+};
+
+struct AssociationEntry {
+    const char* miName;
+    AssociationFactory factory;
+};
+
+const InstanceEntry InstanceEntries[] = {
+    {"instanceSensorProfileProvider", SensorProfileProvider_Create_InstanceMI},
+    {"instanceSensorEnabledLogicalElementCapabilitiesProvider",
+        SensorEnabledLogicalElementCapabilitiesProvider_Create_InstanceMI},
+    {"instanceSensorElementCapabilitiesProvider",
+        SensorElementCapabilitiesProvider_Create_InstanceMI},
+    {"instanceSensorSystemDeviceProvider", SensorSystemDeviceProvider_Create_InstanceMI},
+};
+
+const AssociationEntry AssociationEntries[] = {
+    {"associationSensorElementCapabilitiesProvider",
+        SensorElementCapabilitiesProvider_Create_AssociationMI},
+    {"associationSensorSystemDeviceProvider", SensorSystemDeviceProvider_Create_AssociationMI},
+};
+
+const CMPIBroker NoBroker = {};
+
+template <typename Entry>
+class EntryTest : public ::testing::TestWithParam<Entry> {
+protected:
+    auto* create(CMPIStatus* status = nullptr) const
+    {
+        return this->GetParam().factory(&NoBroker, nullptr, status);
+    }
+};
+
+template <typename Entry>
+std::string entryName(const ::testing::TestParamInfo<Entry>& info)
+{
+    return info.param.miName;
+}
+
+using InstanceEntryTest = EntryTest<InstanceEntry>;
+using AssociationEntryTest = EntryTest<AssociationEntry>;
+
+INSTANTIATE_TEST_SUITE_P(
+    All, InstanceEntryTest, ::testing::ValuesIn(InstanceEntries), entryName<InstanceEntry>);
+INSTANTIATE_TEST_SUITE_P(All, AssociationEntryTest, ::testing::ValuesIn(AssociationEntries),
+    entryName<AssociationEntry>);
+
+TEST_P(InstanceEntryTest, theTableHasItsVersionsNameAndHandlers)
+{
+    const CMPIInstanceMI* const mi = create();
+    EXPECT_EQ(mi->hdl, nullptr);
+    EXPECT_EQ(mi->ft->ftVersion, 200U);
+    EXPECT_EQ(mi->ft->miVersion, 200);
+    EXPECT_STREQ(mi->ft->miName, GetParam().miName);
+    EXPECT_NE(mi->ft->cleanup, nullptr);
+    EXPECT_NE(mi->ft->enumerateInstanceNames, nullptr);
+    EXPECT_NE(mi->ft->enumerateInstances, nullptr);
+    EXPECT_NE(mi->ft->getInstance, nullptr);
+}
+
+TEST_P(AssociationEntryTest, theTableHasItsVersionsNameAndHandlers)
+{
+    const CMPIAssociationMI* const mi = create();
+    EXPECT_EQ(mi->hdl, nullptr);
+    EXPECT_EQ(mi->ft->ftVersion, 200U);
+    EXPECT_EQ(mi->ft->miVersion, 200);
+    EXPECT_STREQ(mi->ft->miName, GetParam().miName);
+    EXPECT_NE(mi->ft->associators, nullptr);
+    EXPECT_NE(mi->ft->associatorNames, nullptr);
+    EXPECT_NE(mi->ft->references, nullptr);
+    EXPECT_NE(mi->ft->referenceNames, nullptr);
+}
+
+template <typename Entry>
+void expectTheSameRecordAtEveryCall(const Entry& entry)
+{
+    const CMPIBroker other = {};
+    auto* const first = entry.factory(&NoBroker, nullptr, nullptr);
+    EXPECT_NE(first, nullptr);
+    EXPECT_EQ(entry.factory(&other, nullptr, nullptr), first);
+}
+
+TEST_P(InstanceEntryTest, everyCallReturnsTheSameRecord)
+{
+    expectTheSameRecordAtEveryCall(GetParam());
+}
+
+TEST_P(AssociationEntryTest, everyCallReturnsTheSameRecord)
+{
+    expectTheSameRecordAtEveryCall(GetParam());
+}
+
+template <typename Entry>
+void expectAnUntouchedStatus(const Entry& entry)
+{
+    CMPIStatus status = {CMPI_RC_ERR_ACCESS_DENIED, nullptr};
+    entry.factory(&NoBroker, nullptr, &status);
+    EXPECT_EQ(status.rc, CMPI_RC_ERR_ACCESS_DENIED);
+}
+
+TEST_P(InstanceEntryTest, theStatusIsNotWritten)
+{
+    expectAnUntouchedStatus(GetParam());
+}
+
+TEST_P(AssociationEntryTest, theStatusIsNotWritten)
+{
+    expectAnUntouchedStatus(GetParam());
+}
+
+void expectStatus(const CMPIStatus& status, CMPIrc code)
+{
+    EXPECT_EQ(status.rc, code);
+    EXPECT_EQ(status.msg, nullptr);
+}
+
+TEST_P(InstanceEntryTest, cleanupIsOkWhetherTerminatingOrNotAndSilent)
+{
+    const Testing::LogCapture capture;
+    CMPIInstanceMI* const mi = create();
+    expectStatus(mi->ft->cleanup(mi, nullptr, 0), CMPI_RC_OK);
+    expectStatus(mi->ft->cleanup(mi, nullptr, 1), CMPI_RC_OK);
+    EXPECT_TRUE(capture.log().empty());
+}
+
+TEST_P(AssociationEntryTest, cleanupIsOkWhetherTerminatingOrNotAndSilent)
+{
+    const Testing::LogCapture capture;
+    CMPIAssociationMI* const mi = create();
+    expectStatus(mi->ft->cleanup(mi, nullptr, 0), CMPI_RC_OK);
+    expectStatus(mi->ft->cleanup(mi, nullptr, 1), CMPI_RC_OK);
+    EXPECT_TRUE(capture.log().empty());
+}
+
+TEST_P(InstanceEntryTest, writingAndQueryingAreNotSupportedWhateverTheArgumentsAndSilent)
+{
+    const Testing::LogCapture capture;
+    CMPIInstanceMI* const mi = create();
+    const CMPIrc refused = CMPI_RC_ERR_NOT_SUPPORTED;
+    expectStatus(mi->ft->createInstance(mi, nullptr, nullptr, nullptr, nullptr), refused);
+    expectStatus(mi->ft->modifyInstance(mi, nullptr, nullptr, nullptr, nullptr, nullptr), refused);
+    expectStatus(mi->ft->deleteInstance(mi, nullptr, nullptr, nullptr), refused);
+    expectStatus(mi->ft->execQuery(mi, nullptr, nullptr, nullptr, "SELECT *", "WQL"), refused);
+    EXPECT_TRUE(capture.log().empty());
+}
+
+} // namespace

@@ -1,0 +1,23 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// The library's entry points, as an object manager finds them.
+
+#pragma once
+
+#include <cmpidt.h>
+#include <cmpift.h>
+
+extern "C" {
+CMPIInstanceMI* SensorProfileProvider_Create_InstanceMI(
+    const CMPIBroker*, const CMPIContext*, CMPIStatus*);
+CMPIInstanceMI* SensorEnabledLogicalElementCapabilitiesProvider_Create_InstanceMI(
+    const CMPIBroker*, const CMPIContext*, CMPIStatus*);
+CMPIInstanceMI* SensorElementCapabilitiesProvider_Create_InstanceMI(
+    const CMPIBroker*, const CMPIContext*, CMPIStatus*);
+CMPIAssociationMI* SensorElementCapabilitiesProvider_Create_AssociationMI(
+    const CMPIBroker*, const CMPIContext*, CMPIStatus*);
+CMPIInstanceMI* SensorSystemDeviceProvider_Create_InstanceMI(
+    const CMPIBroker*, const CMPIContext*, CMPIStatus*);
+CMPIAssociationMI* SensorSystemDeviceProvider_Create_AssociationMI(
+    const CMPIBroker*, const CMPIContext*, CMPIStatus*);
+}

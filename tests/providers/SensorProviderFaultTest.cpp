@@ -1,0 +1,369 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// What becomes of a request of ZUMLO_NumericSensor when the broker fails it.
+
+#include "tests/providers/Factories.h"
+#include "tests/support/FaultSweep.h"
+#include "tests/support/ProviderTest.h"
+
+#include <gmock/gmock.h>
+
+namespace {
+
+using Testing::BrokerCall;
+using Testing::BrokerMessage;
+using Testing::describe;
+using ::testing::ElementsAre;
+using Testing::FaultManner;
+using Testing::FaultyBroker;
+using Testing::LogCapture;
+using Testing::property;
+using Testing::ProviderTest;
+using Testing::ScriptedMachine;
+using Testing::ScriptedNode;
+using Vorn::NodeReading;
+using Vorn::NodeLexicon::NodeType;
+
+constexpr const char* Class = "ZUMLO_NumericSensor";
+const std::vector<ScriptedNode> TwoSensors = {{NodeType::Temperature, "/t", "CPU", NodeReading{}},
+    {NodeType::Tachometer, "/f", "Fan", NodeReading{}}};
+
+enum class Operation { names, instances, oneInstance, instanceByPath, instanceWithoutKeys };
+
+// One request with a broker of its own choosing, and all that came of it.
+class FaultyRequest {
+public:
+    FaultyRequest(Host::Broker& broker, FaultyBroker& faulty, Operation operation,
+        const char** properties = nullptr)
+        : request_(broker)
+    {
+        broker.setTraceObserver([this](const Host::TraceMessage& message) {
+            messages.push_back({static_cast<unsigned>(message.level),
+                std::string(message.component), std::string(message.text)});
+        });
+        CMPIInstanceMI* const mi =
+            SensorProfileProvider_Create_InstanceMI(faulty.handle(), nullptr, nullptr);
+        const CMPIContext* const context = request_.context().handle();
+        const CMPIResult* const result = faulty.watch(result_.handle());
+        const CMPIObjectPath* const ref = faulty.watch(path(operation).handle());
+        if (operation == Operation::names)
+            status = mi->ft->enumerateInstanceNames(mi, context, result, ref);
+        else if (operation == Operation::instances)
+            status = mi->ft->enumerateInstances(mi, context, result, ref, properties);
+        else
+            status = mi->ft->getInstance(mi, context, result, ref, properties);
+        broker.setTraceObserver({});
+    }
+
+    std::string message() const { return Testing::textOf(status.msg); }
+
+    Host::CollectedResult answer;
+    std::vector<BrokerMessage> messages;
+    CMPIStatus status = {};
+
+private:
+    Host::ObjectPath& path(Operation operation)
+    {
+        Host::ObjectPath& made = request_.makePath("root/cimv2", Class);
+        if (operation == Operation::oneInstance)
+            made.addKey("DeviceID", Host::Value::text(request_.arena(), "Fan:/f"));
+        if (operation == Operation::instanceByPath)
+            made.addKey("Other", Host::Value::text(request_.arena(), "x"));
+        return made;
+    }
+
+    Host::Request request_;
+    Host::Result result_{answer};
+};
+
+class SensorProviderFaultTest : public ::testing::Test {
+protected:
+    // Runs the request with one fault.
+    std::unique_ptr<FaultyRequest> run(
+        Operation operation, const Testing::Fault& fault, const char** properties = nullptr)
+    {
+        faulty_.reset(); // the last one made is the one in force, so they end in turn
+        faulty_ = std::make_unique<FaultyBroker>(broker_);
+        faulty_->plan(fault);
+        auto request = std::make_unique<FaultyRequest>(broker_, *faulty_, operation, properties);
+        EXPECT_EQ(faulty_->fired(), 1U) << "the request does not get as far as the fault";
+        return request;
+    }
+
+    Host::Broker broker_;
+    std::unique_ptr<FaultyBroker> faulty_;
+    ScriptedMachine machine_{TwoSensors};
+};
+
+// ---- Every call, every way ----
+
+class SensorProviderFaultSweep : public SensorProviderFaultTest,
+                                 public ::testing::WithParamInterface<Operation> {};
+
+INSTANTIATE_TEST_SUITE_P(EveryRequest, SensorProviderFaultSweep,
+    ::testing::Values(Operation::names, Operation::instances, Operation::oneInstance,
+        Operation::instanceByPath, Operation::instanceWithoutKeys));
+
+TEST_P(SensorProviderFaultSweep, isSurvivedAndAnswersWithNothingMadeUp)
+{
+    Testing::sweepFaults(broker_, [&](FaultyBroker& faulty) {
+        const FaultyRequest request(broker_, faulty, GetParam());
+        EXPECT_TRUE(request.status.rc == CMPI_RC_OK || request.status.rc == CMPI_RC_ERR_FAILED)
+            << request.status.rc;
+        EXPECT_LE(request.answer.paths().size(), 2U);
+        EXPECT_LE(request.answer.instances().size(), 2U);
+        for (const Host::Instance* const instance : request.answer.instances())
+            EXPECT_EQ(instance->className(), Class);
+        for (const Host::ObjectPath* const path : request.answer.paths()) {
+            EXPECT_EQ(path->className(), Class);
+            EXPECT_EQ(path->nameSpace(), "root/cimv2");
+        }
+    });
+}
+
+// ---- Paths ----
+
+class PathFailureTest : public SensorProviderFaultTest,
+                        public ::testing::WithParamInterface<FaultManner> {
+protected:
+    static void expectFailedPath(const FaultyRequest& request)
+    {
+        EXPECT_EQ(request.status.rc, CMPI_RC_ERR_FAILED);
+        EXPECT_EQ(request.message(), "Create CMPIObjectPath failed.");
+        EXPECT_TRUE(request.answer.paths().empty());
+        EXPECT_FALSE(request.answer.isDone());
+        EXPECT_THAT(request.messages,
+            ElementsAre(BrokerMessage{2, "SensorProfileProvider",
+                "Create CMPIObjectPath                     failed for RecordLogClass."}));
+    }
+};
+
+INSTANTIATE_TEST_SUITE_P(NullOrHandleless, PathFailureTest,
+    ::testing::Values(FaultManner::nullResult, FaultManner::handleless));
+
+TEST_P(PathFailureTest, anEnumerationOfNamesEndsAtTheFirstPathThatCannotBeMade)
+{
+    for (const unsigned nth : {1U, 2U})
+        expectFailedPath(*run(Operation::names, {BrokerCall::newObjectPath, nth, GetParam()}));
+}
+
+TEST_P(PathFailureTest, aNamespaceThatCannotBeReadIsAPathThatCannotBeMade)
+{
+    expectFailedPath(*run(Operation::names, {BrokerCall::getNameSpace, 1, GetParam()}));
+}
+
+TEST_P(PathFailureTest, anInstanceWithoutAPathIsANullInstance)
+{
+    const auto request = run(Operation::instances, {BrokerCall::newObjectPath, 1, GetParam()});
+    EXPECT_EQ(request->status.rc, CMPI_RC_OK);
+    EXPECT_EQ(request->answer.instances().size(), 1U);
+    EXPECT_EQ(request->answer.refused(), 1U); // the null entry is passed on as it is
+    EXPECT_TRUE(request->answer.isDone());
+    EXPECT_TRUE(request->messages.empty());
+}
+
+TEST_P(PathFailureTest, anInstanceThatCannotBeMadeIsPassedOnAsItIs)
+{
+    for (const Operation operation : {Operation::instances, Operation::oneInstance}) {
+        const auto request = run(operation, {BrokerCall::newInstance, 1, GetParam()});
+        EXPECT_EQ(request->status.rc, CMPI_RC_OK);
+        EXPECT_EQ(request->answer.refused(), 1U);
+        EXPECT_TRUE(request->answer.isDone());
+    }
+}
+
+TEST_P(PathFailureTest, anInstanceWhosePathIsNotToldEqualsNothing)
+{
+    const auto request = run(Operation::instanceByPath, {BrokerCall::getObjectPath, 1, GetParam()});
+    EXPECT_EQ(request->answer.instances().size(), 0U);
+    EXPECT_TRUE(request->answer.isDone());
+}
+
+// ---- Arrays, in the order in which an instance needs them ----
+
+constexpr unsigned PossibleStates = 1;
+constexpr unsigned SupportedThresholds = 2;
+constexpr unsigned SettableThresholds = 3;
+constexpr unsigned OperationalStatus = 4;
+
+class ArrayFailureTest : public SensorProviderFaultTest,
+                         public ::testing::WithParamInterface<FaultManner> {
+protected:
+    std::unique_ptr<FaultyRequest> runWithout(unsigned array)
+    {
+        return run(Operation::oneInstance, {BrokerCall::newArray, array, GetParam(), CMPI_RC_OK});
+    }
+
+    static void expectReport(
+        const FaultyRequest& request, const std::string& statusText, const std::string& traceText)
+    {
+        EXPECT_EQ(request.status.rc, CMPI_RC_ERR_FAILED);
+        EXPECT_EQ(request.message(), statusText);
+        EXPECT_THAT(
+            request.messages, ElementsAre(BrokerMessage{2, "SensorProfileProvider", traceText}));
+        EXPECT_EQ(request.answer.instances().size(), 1U); // as far as it was built
+        EXPECT_TRUE(request.answer.isDone());
+    }
+
+    static std::string lastProperty(const FaultyRequest& request)
+    {
+        return Testing::namesOf(request.answer.instances().at(0)->properties()).back();
+    }
+
+    // The exiting lines of the builder.
+    static std::vector<unsigned> exits(const LogCapture& capture)
+    {
+        std::vector<unsigned> lines;
+        for (const Testing::LogLine& line : capture.log())
+            if (line.function == "makeSensorInstance" && line.text.starts_with("EXITING"))
+                lines.push_back(line.line);
+        return lines;
+    }
+};
+
+INSTANTIATE_TEST_SUITE_P(NullOrHandleless, ArrayFailureTest,
+    ::testing::Values(FaultManner::nullResult, FaultManner::handleless));
+
+TEST_P(ArrayFailureTest, withoutPossibleStatesTheBuildGoesOn)
+{
+    const LogCapture capture;
+    const auto request = runWithout(PossibleStates);
+    EXPECT_EQ(request->status.rc, CMPI_RC_OK);
+    ASSERT_EQ(request->answer.instances().size(), 1U);
+    EXPECT_EQ(property(*request->answer.instances()[0], "PossibleStates"), "absent");
+    EXPECT_EQ(lastProperty(*request), "UnitModifier");
+    EXPECT_TRUE(request->messages.empty());
+    EXPECT_THAT(exits(capture), ElementsAre(737));
+    std::vector<std::string> failures;
+    for (const Testing::LogLine& line : capture.log())
+        if (line.level == 6000)
+            failures.push_back(Testing::withoutPointers(line));
+    EXPECT_THAT(failures,
+        ElementsAre("makeSensorInstance(SensorFactory:440) 6000 MESSAGE [File: SensorFactory, "
+                    "Line: 440]: Failed to create CMPIArray for PossibleStates"));
+}
+
+TEST_P(ArrayFailureTest, withoutSupportedThresholdsTheBuildEndsWithoutItsExitingLine)
+{
+    const LogCapture capture;
+    const auto request = runWithout(SupportedThresholds);
+    const std::string text =
+        "Create Array for Property" + std::string(25, ' ') + "SupportedThresholds failed.";
+    expectReport(*request, text, text);
+    EXPECT_EQ(lastProperty(*request), "RateUnits");
+    EXPECT_TRUE(exits(capture).empty());
+}
+
+TEST_P(ArrayFailureTest, withoutSettableThresholdsTheBuildEndsWithoutItsExitingLine)
+{
+    const LogCapture capture;
+    const auto request = runWithout(SettableThresholds);
+    const std::string text =
+        "Create Array for Property" + std::string(25, ' ') + "SettableThresholds failed.";
+    expectReport(*request, text, text);
+    EXPECT_EQ(lastProperty(*request), "SupportedThresholds");
+    EXPECT_TRUE(exits(capture).empty());
+}
+
+TEST_P(ArrayFailureTest, withoutOperationalStatusTheBuildEndsWithAnExitingLineOfItsOwn)
+{
+    const LogCapture capture;
+    const auto request = runWithout(OperationalStatus);
+    expectReport(*request,
+        "Create Array for Property" + std::string(25, ' ') + "OperationalStatus failed.",
+        "Create Array for Property Operat" + std::string(24, ' ') + "ionalStatus failed.");
+    EXPECT_EQ(lastProperty(*request), "Status");
+    EXPECT_THAT(exits(capture), ElementsAre(615));
+}
+
+TEST_P(ArrayFailureTest, inAnEnumerationLeavesTheOtherInstancesWhole)
+{
+    const auto request = run(
+        Operation::instances, {BrokerCall::newArray, SupportedThresholds, GetParam(), CMPI_RC_OK});
+    EXPECT_EQ(request->messages.size(), 1U);
+    ASSERT_EQ(request->answer.instances().size(), 2U);
+    EXPECT_EQ(property(*request->answer.instances()[0], "SupportedThresholds"), "absent");
+    EXPECT_EQ(request->answer.instances()[1]->properties().size(), 22U);
+    EXPECT_TRUE(request->answer.isDone());
+}
+
+TEST_F(SensorProviderFaultTest, aLabelThatCannotBeMadeIsAnEmptyElement)
+{
+    for (const FaultManner manner :
+        {FaultManner::nullResult, FaultManner::handleless, FaultManner::errorStatus}) {
+        const auto request = run(Operation::oneInstance, {BrokerCall::newString, 2, manner});
+        ASSERT_EQ(request->answer.instances().size(), 1U);
+        const Host::Array& states =
+            *request->answer.instances()[0]->property("PossibleStates")->array();
+        ASSERT_EQ(states.elements().size(), 12U);
+        EXPECT_EQ(describe(states.elements()[0]), "string \"Normal\"");
+        EXPECT_TRUE(states.elements()[1].isNull());
+        EXPECT_EQ(describe(states.elements()[2]), "string \"Non-Critical\"");
+    }
+}
+
+// ---- What is ignored ----
+
+// Without the broker's filter the builder's own selection shows.
+TEST_F(SensorProviderFaultTest, healthStateBringsStatusAlong)
+{
+    const char* properties[] = {"HealthState", nullptr};
+    const auto request = run(Operation::oneInstance,
+        {BrokerCall::setPropertyFilter, 1, FaultManner::errorStatus}, properties);
+    ASSERT_EQ(request->answer.instances().size(), 1U);
+    EXPECT_EQ(property(*request->answer.instances()[0], "HealthState"), "uint16 0");
+    EXPECT_EQ(property(*request->answer.instances()[0], "Status"), "string \"\"");
+    EXPECT_EQ(request->answer.instances()[0]->properties().size(), 6U);
+}
+
+TEST_F(SensorProviderFaultTest, settingsThatFailAreIgnored)
+{
+    for (const BrokerCall call : {BrokerCall::setProperty, BrokerCall::setElementAt,
+             BrokerCall::setHostname, BrokerCall::setNameSpace, BrokerCall::returnDone}) {
+        const auto request = run(Operation::oneInstance, {call, 1, FaultManner::errorStatus});
+        EXPECT_EQ(request->status.rc, CMPI_RC_OK) << Testing::nameOf(call);
+        EXPECT_EQ(request->answer.instances().size(), 1U) << Testing::nameOf(call);
+    }
+}
+
+// ---- Keys ----
+
+TEST_F(SensorProviderFaultTest, aKeyReportedMissingThroughTheStatusIsAbsentAndTheAnswerIsOk)
+{
+    for (const FaultManner manner : {FaultManner::nullResult, FaultManner::handleless}) {
+        const auto request = run(
+            Operation::oneInstance, {BrokerCall::getKey, 1, manner, CMPI_RC_ERR_NO_SUCH_PROPERTY});
+        EXPECT_EQ(request->status.rc, CMPI_RC_OK);
+        EXPECT_EQ(request->status.msg, nullptr);
+        EXPECT_TRUE(request->answer.instances().empty());
+        EXPECT_TRUE(request->answer.isDone());
+    }
+}
+
+TEST_F(SensorProviderFaultTest, aKeyWithoutCharactersFindsNothing)
+{
+    const auto request = run(
+        Operation::oneInstance, {BrokerCall::getCharPtr, 1, FaultManner::nullResult, CMPI_RC_OK});
+    EXPECT_EQ(request->status.rc, CMPI_RC_OK);
+    EXPECT_TRUE(request->answer.instances().empty());
+    EXPECT_FALSE(request->answer.isDone());
+}
+
+TEST_F(SensorProviderFaultTest, aPathThatCannotCountItsKeysHasNone)
+{
+    const auto request =
+        run(Operation::oneInstance, {BrokerCall::getKeyCount, 1, FaultManner::nullResult});
+    EXPECT_EQ(request->status.rc, CMPI_RC_ERR_FAILED);
+    EXPECT_EQ(request->message(), "At least one key should be passed");
+    EXPECT_TRUE(request->answer.isDone());
+}
+
+TEST_F(SensorProviderFaultTest, aFailureWhoseMessageCannotBeMadeHasNone)
+{
+    const auto request =
+        run(Operation::instanceWithoutKeys, {BrokerCall::newString, 1, FaultManner::nullResult});
+    EXPECT_EQ(request->status.rc, CMPI_RC_ERR_FAILED);
+    EXPECT_EQ(request->status.msg, nullptr);
+}
+
+} // namespace

@@ -1,0 +1,263 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// The requests of ZUMLO_NumericSensor, from the object manager's side.
+
+#include "tests/providers/Factories.h"
+#include "tests/support/ProviderTest.h"
+
+#include <gmock/gmock.h>
+
+namespace {
+
+using Testing::BrokerMessage;
+using ::testing::ElementsAre;
+using ::testing::IsEmpty;
+using Testing::LogCapture;
+using Testing::property;
+using Testing::ProviderTest;
+using Testing::ScriptedMachine;
+using Testing::ScriptedNode;
+using Vorn::NodeReading;
+using Vorn::NodeLexicon::NodeType;
+
+constexpr const char* Class = "ZUMLO_NumericSensor";
+constexpr const char* NoKeyText = "At least one key should be passed";
+
+const std::vector<ScriptedNode> Machine = {{NodeType::Temperature, "/p/b", "CPU", NodeReading{}},
+    {NodeType::Temperature, "/p/a", "CPU", NodeReading{}},
+    {NodeType::Tachometer, "/p", "Fan", NodeReading{}}};
+
+class SensorProviderTest : public ProviderTest {
+protected:
+    explicit SensorProviderTest(const std::vector<ScriptedNode>& nodes = Machine)
+        : machine_(nodes), mi_(SensorProfileProvider_Create_InstanceMI(broker(), nullptr, nullptr))
+    {
+    }
+
+    CMPIStatus enumerateNames(const char* nameSpace = NameSpace)
+    {
+        return mi_->ft->enumerateInstanceNames(
+            mi_, context(), result(), path(Class, {}, nameSpace).handle());
+    }
+
+    CMPIStatus enumerate(const char** properties = nullptr)
+    {
+        return mi_->ft->enumerateInstances(
+            mi_, context(), result(), path(Class).handle(), properties);
+    }
+
+    CMPIStatus get(const Host::ObjectPath& ref, const char** properties = nullptr)
+    {
+        return mi_->ft->getInstance(mi_, context(), result(), ref.handle(), properties);
+    }
+
+    CMPIStatus get(const std::vector<std::pair<std::string, std::string>>& keys)
+    {
+        return get(path(Class, keys));
+    }
+
+    static void expectOk(const CMPIStatus& status)
+    {
+        EXPECT_EQ(status.rc, CMPI_RC_OK);
+        EXPECT_EQ(status.msg, nullptr);
+    }
+
+    std::vector<std::string> deliveredIdentifiers() const
+    {
+        std::vector<std::string> identifiers;
+        for (const Host::ObjectPath* const each : answer_.paths())
+            identifiers.emplace_back(*each->key("DeviceID")->text());
+        for (const Host::Instance* const each : answer_.instances())
+            identifiers.emplace_back(*each->property("DeviceID")->text());
+        return identifiers;
+    }
+
+    ScriptedMachine machine_;
+    CMPIInstanceMI* mi_;
+};
+
+class SensorlessProviderTest : public SensorProviderTest {
+protected:
+    SensorlessProviderTest() : SensorProviderTest({}) {}
+};
+
+// ---- EnumInstanceNames ----
+
+TEST_F(SensorProviderTest, namesComeOrderedAndTheResultIsClosed)
+{
+    expectOk(enumerateNames());
+    EXPECT_THAT(deliveredIdentifiers(), ElementsAre("CPU:/p/a", "CPU:/p/b", "Fan:/p"));
+    EXPECT_TRUE(answer_.isDone());
+    EXPECT_TRUE(messages_.empty());
+}
+
+TEST_F(SensorProviderTest, everyNameHasTheRequestsNamespace)
+{
+    expectOk(enumerateNames("root/other"));
+    ASSERT_EQ(answer_.paths().size(), 3U);
+    for (const Host::ObjectPath* const each : answer_.paths())
+        EXPECT_EQ(each->nameSpace(), "root/other");
+}
+
+TEST_F(SensorlessProviderTest, namesAreAnOpenEmptyAnswer)
+{
+    expectOk(enumerateNames());
+    EXPECT_TRUE(answer_.paths().empty());
+    EXPECT_FALSE(answer_.isDone());
+    EXPECT_THAT(messages_,
+        ElementsAre(BrokerMessage{1, "SensorProfileProvider", "***No instance found***"}));
+}
+
+// ---- EnumInstances ----
+
+TEST_F(SensorProviderTest, instancesComeOrderedAndTheResultIsClosed)
+{
+    expectOk(enumerate());
+    EXPECT_THAT(deliveredIdentifiers(), ElementsAre("CPU:/p/a", "CPU:/p/b", "Fan:/p"));
+    EXPECT_TRUE(answer_.isDone());
+    EXPECT_EQ(answer_.instances()[0]->properties().size(), 22U); // all but the six thresholds
+}
+
+TEST_F(SensorProviderTest, instancesHaveTheListedPropertiesAndTheKeys)
+{
+    const char* properties[] = {"Name", nullptr};
+    expectOk(enumerate(properties));
+    ASSERT_EQ(answer_.instances().size(), 3U);
+    EXPECT_EQ(answer_.instances()[0]->properties().size(), 5U);
+}
+
+TEST_F(SensorlessProviderTest, instancesAreAClosedEmptyAnswer)
+{
+    expectOk(enumerate());
+    EXPECT_TRUE(answer_.instances().empty());
+    EXPECT_TRUE(answer_.isDone());
+    EXPECT_TRUE(messages_.empty());
+}
+
+TEST_F(SensorProviderTest, everyRequestHarvestsAfresh)
+{
+    expectOk(enumerate());
+    const ScriptedMachine changed({{NodeType::Voltage, "/v", "New", NodeReading{}}});
+    Host::CollectedResult second;
+    Host::Result result(second);
+    mi_->ft->enumerateInstances(mi_, context(), result.handle(), path(Class).handle(), nullptr);
+    ASSERT_EQ(second.instances().size(), 1U);
+    EXPECT_EQ(property(*second.instances()[0], "Name"), "string \"New\"");
+}
+
+// ---- GetInstance ----
+
+TEST_F(SensorProviderTest, aDeviceIDAloneFindsItsInstance)
+{
+    expectOk(get({{"DeviceID", "CPU:/p/b"}}));
+    EXPECT_THAT(deliveredIdentifiers(), ElementsAre("CPU:/p/b"));
+    EXPECT_TRUE(answer_.isDone());
+    EXPECT_EQ(answer_.instances()[0]->properties().size(), 22U);
+}
+
+TEST_F(SensorProviderTest, theOtherKeysAreNotLookedAtBesideADeviceID)
+{
+    expectOk(get({{"SystemName", "elsewhere"}, {"DeviceID", "Fan:/p"}}));
+    EXPECT_THAT(deliveredIdentifiers(), ElementsAre("Fan:/p"));
+}
+
+TEST_F(SensorProviderTest, anInstanceHasTheListedProperties)
+{
+    const char* properties[] = {"CurrentReading", nullptr};
+    expectOk(get(path(Class, {{"DeviceID", "Fan:/p"}}), properties));
+    ASSERT_EQ(answer_.instances().size(), 1U);
+    EXPECT_EQ(answer_.instances()[0]->properties().size(), 5U);
+}
+
+TEST_F(SensorProviderTest, anUnknownDeviceIDIsAnOpenEmptyAnswer)
+{
+    for (const char* const unknown : {"cpu:/p/b", "CPU:/p/b ", "", "other"})
+        expectOk(get({{"DeviceID", unknown}}));
+    EXPECT_TRUE(answer_.instances().empty());
+    EXPECT_FALSE(answer_.isDone());
+    EXPECT_TRUE(messages_.empty());
+}
+
+TEST_F(SensorProviderTest, aPathWithoutKeysIsRefusedInAClosedResult)
+{
+    const CMPIStatus status = get(path(Class));
+    EXPECT_EQ(status.rc, CMPI_RC_ERR_FAILED);
+    EXPECT_EQ(Testing::textOf(status.msg), NoKeyText);
+    EXPECT_THAT(messages_, ElementsAre(BrokerMessage{2, "SensorProfileProvider", NoKeyText}));
+    EXPECT_TRUE(answer_.instances().empty());
+    EXPECT_TRUE(answer_.isDone());
+}
+
+TEST_F(SensorProviderTest, aRefusalHasNoMessageWithoutABroker)
+{
+    SensorProfileProvider_Create_InstanceMI(nullptr, nullptr, nullptr);
+    const CMPIStatus status = get(path(Class));
+    EXPECT_EQ(status.rc, CMPI_RC_ERR_FAILED);
+    EXPECT_EQ(status.msg, nullptr);
+    EXPECT_TRUE(messages_.empty());
+}
+
+TEST_F(SensorProviderTest, withoutADeviceIDTheInstanceOfAnEqualPathIsFound)
+{
+    // The path of an instance has all four keys, so no path without a device identifier
+    // equals one.
+    expectOk(get({{"CreationClassName", Class}, {"SystemCreationClassName", "ZUMLO_ComputerSystem"},
+        {"SystemName", systemName_}}));
+    EXPECT_TRUE(answer_.instances().empty());
+    EXPECT_TRUE(answer_.isDone());
+}
+
+TEST_F(SensorProviderTest, keysThatMatchNothingAreAClosedEmptyAnswer)
+{
+    expectOk(get({{"Other", "x"}}));
+    EXPECT_TRUE(answer_.instances().empty());
+    EXPECT_TRUE(answer_.isDone());
+}
+
+TEST_F(SensorProviderTest, aDeviceIDOfAnotherTypeCountsAsAbsent)
+{
+    Host::ObjectPath& ref = path(Class);
+    ref.addKey("DeviceID", Host::Value::integer(CMPI_uint64, 7));
+    expectOk(get(ref));
+    EXPECT_TRUE(answer_.instances().empty());
+    EXPECT_TRUE(answer_.isDone());
+}
+
+// Some object managers list every key of the class, those a client left out as null ones.
+TEST_F(SensorProviderTest, aNullDeviceIDCountsAsAbsent)
+{
+    Host::ObjectPath& ref = path(Class, {{"SystemName", systemName_}});
+    ref.addKey("DeviceID", Host::Value::absent());
+    expectOk(get(ref));
+    EXPECT_TRUE(answer_.isDone());
+}
+
+// ---- Round trip ----
+
+TEST_F(SensorProviderTest, everyNameThatIsEnumeratedCanBeFetched)
+{
+    expectOk(enumerateNames());
+    for (const Host::ObjectPath* const name : answer_.paths()) {
+        Host::CollectedResult fetched;
+        Host::Result into(fetched);
+        mi_->ft->getInstance(mi_, context(), into.handle(), name->handle(), nullptr);
+        ASSERT_EQ(fetched.instances().size(), 1U);
+        EXPECT_EQ(fetched.instances()[0]->objectPath().toText(), name->toText());
+    }
+}
+
+// ---- Factories ----
+
+TEST_F(SensorProviderTest, theBrokerOfTheLastFactoryCallIsUsed)
+{
+    Host::Broker other;
+    std::vector<std::string> seen;
+    other.setTraceObserver(
+        [&](const Host::TraceMessage& message) { seen.emplace_back(message.text); });
+    SensorProfileProvider_Create_InstanceMI(other.handle(), nullptr, nullptr);
+    get(path(Class));
+    EXPECT_THAT(seen, ElementsAre(NoKeyText));
+    EXPECT_TRUE(messages_.empty());
+}
+
+} // namespace

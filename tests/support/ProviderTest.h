@@ -1,0 +1,102 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// A request in the embedded broker, as a provider sees it, and what comes of it.
+
+#pragma once
+
+#include "host/broker/Broker.h"
+#include "host/broker/CollectedResult.h"
+#include "host/broker/ObjectPath.h"
+#include "host/broker/Request.h"
+#include "host/broker/Result.h"
+#include "host/broker/String.h"
+#include "platform/utilities/ProviderUtilities.h"
+#include "tests/support/Describe.h"
+#include "tests/support/LogCapture.h"
+#include "tests/support/ScriptedMachine.h"
+
+#include <gtest/gtest.h>
+
+#include <memory>
+#include <ostream>
+#include <regex>
+#include <string>
+#include <string_view>
+#include <utility>
+#include <vector>
+
+namespace Testing {
+
+// A message to the broker's trace facility.
+struct BrokerMessage {
+    unsigned level;
+    std::string component;
+    std::string text;
+
+    bool operator==(const BrokerMessage&) const = default;
+};
+
+inline std::ostream& operator<<(std::ostream& out, const BrokerMessage& message)
+{
+    return out << message.level << ' ' << message.component << ": " << message.text;
+}
+
+inline std::string textOf(const CMPIString* string)
+{
+    const Host::String* const found = Host::String::of(string);
+    return found ? std::string(found->text().value_or("(null)")) : "(null)";
+}
+
+// A trace line without its pointers: `setVector(Sensor:740) 3000 ENTERING: ... =PTR`.
+inline std::string withoutPointers(const LogLine& line)
+{
+    static const std::regex pointer("=0x[0-9a-f]+");
+    return line.function + "(" + line.file + ":" + std::to_string(line.line) + ") " +
+           std::to_string(line.level) + " " + std::regex_replace(line.text, pointer, "=PTR");
+}
+
+inline std::vector<std::string> withoutPointers(const std::vector<LogLine>& lines)
+{
+    std::vector<std::string> texts;
+    for (const LogLine& line : lines)
+        texts.push_back(withoutPointers(line));
+    return texts;
+}
+
+class ProviderTest : public ::testing::Test {
+protected:
+    static constexpr const char* NameSpace = "root/cimv2";
+
+    ProviderTest()
+    {
+        broker_.setTraceObserver([this](const Host::TraceMessage& message) {
+            messages_.push_back({static_cast<unsigned>(message.level),
+                std::string(message.component), std::string(message.text)});
+        });
+        request_ = std::make_unique<Host::Request>(broker_);
+    }
+
+    // A path with text keys in the request's namespace.
+    Host::ObjectPath& path(const char* className,
+        const std::vector<std::pair<std::string, std::string>>& keys = {},
+        const char* nameSpace = NameSpace)
+    {
+        Host::ObjectPath& made = request_->makePath(nameSpace, className);
+        for (const auto& [name, text] : keys)
+            made.addKey(name, Host::Value::text(request_->arena(), text));
+        return made;
+    }
+
+    const CMPIBroker* broker() const { return broker_.handle(); }
+    const CMPIContext* context() { return request_->context().handle(); }
+    const CMPIResult* result() const { return result_.handle(); }
+
+    Host::Broker broker_;
+    std::unique_ptr<Host::Request> request_;
+    Host::CollectedResult answer_;
+    Host::Result result_{answer_};
+    std::vector<BrokerMessage> messages_;
+    const std::string systemName_ = Vorn::getSystemName();
+};
+
+} // namespace Testing
