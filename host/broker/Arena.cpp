@@ -1,0 +1,63 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "host/broker/Arena.h"
+
+#include "host/broker/Refusal.h"
+#include "host/broker/String.h"
+
+#include <cstring>
+
+namespace Host {
+
+namespace {
+
+// A clone is mostly one small object; a request makes many.
+constexpr std::size_t requestBlock = 16 * 1024;
+constexpr std::size_t cloneBlock = 512;
+
+thread_local Arena* currentArena = nullptr;
+
+} // namespace
+
+Arena::Arena(Purpose purpose)
+    : purpose_(purpose), memory_(purpose == Purpose::clone ? cloneBlock : requestBlock),
+      names_(&memory_)
+{
+}
+
+std::string_view Arena::text(std::string_view characters)
+{
+    char* const copy = static_cast<char*>(memory_.allocate(characters.size() + 1, 1));
+    if (!characters.empty())
+        std::memcpy(copy, characters.data(), characters.size());
+    copy[characters.size()] = '\0';
+    return {copy, characters.size()};
+}
+
+const String& Arena::name(std::string_view characters)
+{
+    if (const auto known = names_.find(characters); known != names_.end())
+        return *known->second;
+    const String& made = String::make(*this, characters);
+    names_.emplace(*made.text(), &made);
+    return made;
+}
+
+Arena* Arena::current() noexcept
+{
+    return currentArena;
+}
+
+Arena& Arena::required()
+{
+    if (currentArena == nullptr)
+        throw Refusal(CMPI_RC_ERR_FAILED, "no request is active on this thread");
+    return *currentArena;
+}
+
+Arena* Arena::makeCurrent(Arena* arena) noexcept
+{
+    return std::exchange(currentArena, arena);
+}
+
+} // namespace Host

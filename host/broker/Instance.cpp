@@ -1,0 +1,178 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "host/broker/Instance.h"
+
+#include "host/broker/ClassInformation.h"
+#include "host/broker/Names.h"
+#include "host/broker/ObjectPath.h"
+#include "host/broker/Slot.h"
+#include "host/broker/String.h"
+#include "host/broker/Types.h"
+
+#include <algorithm>
+
+namespace Host {
+
+namespace {
+
+using NameList = std::span<const String* const>;
+
+bool contains(NameList names, std::string_view name)
+{
+    return std::any_of(names.begin(), names.end(),
+        [name](const String* known) { return equalNames(*known->text(), name); });
+}
+
+// A list of texts that ends with a null; null itself is an empty list.
+NameList copied(Arena& arena, const char** names)
+{
+    std::size_t count = 0;
+    while (names != nullptr && names[count] != nullptr)
+        ++count;
+    const String** const copy = arena.makeArray<const String*>(count);
+    std::transform(
+        names, names + count, copy, [&arena](const char* name) { return &arena.name(name); });
+    return {copy, count};
+}
+
+NameList copied(Arena& arena, NameList names)
+{
+    const String** const copy = arena.makeArray<const String*>(names.size());
+    std::transform(names.begin(), names.end(), copy,
+        [&arena](const String* name) { return &arena.name(*name->text()); });
+    return {copy, names.size()};
+}
+
+void addKeyIfSet(ObjectPath& path, const NamedValues& properties, std::string_view name)
+{
+    const NamedValue* const found = properties.find(name);
+    if (found == nullptr || found->value.isNull() || isArrayType(found->value.type()) ||
+        found->value.type() == CMPI_instance)
+        return;
+    path.addKey(name, found->value.copiedTo(Arena::required()));
+}
+
+} // namespace
+
+Instance::Instance(Arena& home, const ObjectPath& path, const ClassInformation* classes)
+    : Encapsulated(&home), path_(&path), classes_(classes)
+{
+}
+
+Instance& Instance::make(Arena& arena, const ObjectPath& path, const ClassInformation* classes)
+{
+    return arena.make<Instance>(arena, path.copiedTo(arena), classes);
+}
+
+std::string_view Instance::className() const noexcept
+{
+    return path_->className();
+}
+
+const Value* Instance::property(std::string_view name) const noexcept
+{
+    const NamedValue* const found = properties_.find(name);
+    return found == nullptr ? nullptr : &found->value;
+}
+
+void Instance::setProperty(std::string_view name, const Value& value)
+{
+    if (isWanted(name))
+        properties_.set(memory(), name, value);
+}
+
+ObjectPath& Instance::objectPath() const
+{
+    ObjectPath& path = path_->copiedTo(Arena::required());
+    const auto* const known =
+        classes_ == nullptr ? nullptr : classes_->keysOf(path.nameSpace(), path.className());
+    if (known != nullptr) {
+        for (const std::string& name : *known)
+            addKeyIfSet(path, properties_, name);
+    } else {
+        for (const String* const name : keyNames_)
+            addKeyIfSet(path, properties_, *name->text());
+    }
+    return path;
+}
+
+Instance& Instance::copiedTo(Arena& arena) const
+{
+    const bool livesThere = home_ == &arena;
+    Instance& copy = make(arena, *path_, classes_);
+    copy.properties_ = properties_.copiedTo(arena, livesThere);
+    copy.isFiltered_ = isFiltered_;
+    copy.wanted_ = livesThere ? wanted_ : copied(arena, wanted_);
+    copy.keyNames_ = livesThere ? keyNames_ : copied(arena, keyNames_);
+    return copy;
+}
+
+bool Instance::isKey(std::string_view name) const
+{
+    if (contains(keyNames_, name))
+        return true;
+    const auto* const known =
+        classes_ == nullptr ? nullptr : classes_->keysOf(path_->nameSpace(), path_->className());
+    return known != nullptr && std::any_of(known->begin(), known->end(),
+                                   [name](const auto& key) { return equalNames(key, name); });
+}
+
+bool Instance::isWanted(std::string_view name) const
+{
+    return !isFiltered_ || contains(wanted_, name) || isKey(name);
+}
+
+void Instance::setPropertyFilter(const char** properties, const char** keys)
+{
+    Arena& arena = memory();
+    isFiltered_ = properties != nullptr;
+    wanted_ = copied(arena, properties);
+    keyNames_ = copied(arena, keys);
+    if (isFiltered_ && properties_.size() != 0)
+        properties_.retain(
+            arena, [this](const NamedValue& property) { return isWanted(*property.name->text()); });
+}
+
+void Instance::setProviderProperty(const char* name, const CMPIValue* value, CMPIType type)
+{
+    const std::string_view wanted = requiredText(name, "the property's name");
+    if (isWanted(wanted))
+        properties_.set(memory(), wanted, Value::from(memory(), value, type));
+}
+
+void Instance::setPropertyWithOrigin(
+    const char* name, const CMPIValue* value, CMPIType type, const char*)
+{
+    setProviderProperty(name, value, type); // class origins are the class's to tell
+}
+
+CMPIData Instance::getProperty(const char* name) const
+{
+    return properties_.get(name, CMPI_RC_ERR_NO_SUCH_PROPERTY);
+}
+
+CMPIData Instance::getPropertyAt(CMPICount position, CMPIString** name) const
+{
+    return properties_.getAt(position, name);
+}
+
+void Instance::setObjectPath(const CMPIObjectPath* path)
+{
+    path_ = &required<ObjectPath>(path).copiedTo(memory());
+}
+
+const CMPIInstanceFT Instance::functions = {
+    .ftVersion = CMPIVersion200,
+    .release = slot<&Instance::release>,
+    .clone = slot<&Instance::cloned>,
+    .getProperty = slot<&Instance::getProperty>,
+    .getPropertyAt = slot<&Instance::getPropertyAt>,
+    .getPropertyCount = slot<+[](const Instance& instance) { return instance.properties_.size(); }>,
+    .setProperty = slot<&Instance::setProviderProperty>,
+    .getObjectPath = slot<&Instance::objectPath>,
+    .setPropertyFilter = slot<&Instance::setPropertyFilter>,
+    .setObjectPath = slot<&Instance::setObjectPath>,
+    .setPropertyWithOrigin = slot<&Instance::setPropertyWithOrigin>,
+};
+
+} // namespace Host

@@ -1,0 +1,61 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "host/broker/NamedValues.h"
+
+#include "host/broker/Names.h"
+#include "host/broker/Slot.h"
+#include "host/broker/String.h"
+
+namespace Host {
+
+const NamedValue* NamedValues::find(std::string_view name) const noexcept
+{
+    for (const NamedValue& element : elements_)
+        if (equalNames(*element.name->text(), name))
+            return &element;
+    return nullptr;
+}
+
+void NamedValues::set(Arena& arena, std::string_view name, const Value& value)
+{
+    if (isShared_)
+        retain(arena, [](const NamedValue&) { return true; });
+    if (const NamedValue* const known = find(name))
+        const_cast<NamedValue*>(known)->value = value; // an element of *this, which is not const
+    else
+        elements_.append(arena, {&arena.name(name), value});
+}
+
+NamedValues NamedValues::copiedTo(Arena& arena, bool livesThere) const
+{
+    NamedValues copy;
+    if (livesThere) {
+        copy.elements_ = elements_;
+        copy.isShared_ = isShared_ = true;
+    } else {
+        for (const auto& [name, value] : elements_)
+            copy.elements_.append(arena, {&arena.name(*name->text()), value.copiedTo(arena)});
+    }
+    return copy;
+}
+
+CMPIData NamedValues::get(const char* name, CMPIrc whenAbsent) const
+{
+    const std::string_view wanted = requiredText(name, "the name");
+    if (const NamedValue* const found = find(wanted))
+        return found->value.handOut();
+    throw Refusal(whenAbsent, "there is no " + std::string(wanted));
+}
+
+CMPIData NamedValues::getAt(CMPICount position, CMPIString** name) const
+{
+    const NamedValue* const found = elements_.at(position);
+    if (found == nullptr)
+        throw Refusal(CMPI_RC_ERR_NO_SUCH_PROPERTY,
+            "position " + std::to_string(position) + " of " + std::to_string(size()));
+    if (name != nullptr)
+        *name = found->name->handle();
+    return found->value.handOut();
+}
+
+} // namespace Host

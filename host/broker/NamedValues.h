@@ -1,0 +1,67 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// Values found by name, in the order in which they were first set: the keys of a path, the
+// properties of an instance, the arguments of a method, the entries of a context.
+
+#pragma once
+
+#include "host/broker/ArenaList.h"
+#include "host/broker/Value.h"
+
+#include <cmpidt.h>
+
+#include <cstddef>
+#include <string_view>
+
+namespace Host {
+
+struct NamedValue {
+    const String* name = nullptr; // never without text
+    Value value;
+};
+
+// Takes memory for each change from the arena it is handed. A copy within one arena shares
+// its elements with the original until one of the two changes.
+class NamedValues {
+public:
+    NamedValues() noexcept = default;
+    NamedValues(NamedValues&&) noexcept = default;
+    NamedValues& operator=(NamedValues&&) noexcept = default;
+
+    std::size_t size() const noexcept { return elements_.size(); }
+    auto begin() const noexcept { return elements_.begin(); }
+    auto end() const noexcept { return elements_.end(); }
+
+    // Without regard to letter case; null when there is none.
+    const NamedValue* find(std::string_view name) const noexcept;
+
+    // Replaces the value of that name in its place, or adds one at the end. The value must
+    // live as long as the arena.
+    void set(Arena& arena, std::string_view name, const Value& value);
+
+    // Keeps the elements the predicate holds for.
+    template <typename Predicate>
+    void retain(Arena& arena, Predicate predicate)
+    {
+        ArenaList<NamedValue> kept;
+        for (const NamedValue& element : elements_)
+            if (predicate(element))
+                kept.append(arena, element);
+        elements_ = kept;
+        isShared_ = false;
+    }
+
+    // The elements for an object in the arena; shared when the original lives there too.
+    NamedValues copiedTo(Arena& arena, bool livesThere) const;
+
+    // What the get functions of CMPI answer. Throw Refusal with the code when there is no
+    // such name, and with CMPI_RC_ERR_NO_SUCH_PROPERTY when the position is out of range.
+    CMPIData get(const char* name, CMPIrc whenAbsent) const;
+    CMPIData getAt(CMPICount position, CMPIString** name) const; // name may be null
+
+private:
+    ArenaList<NamedValue> elements_;
+    mutable bool isShared_ = false;
+};
+
+} // namespace Host

@@ -1,0 +1,196 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// Slot<function> fills one slot of a CMPI function table with an ordinary C++ function that
+// takes a reference to the object behind the handle. It keeps what every slot has to do in
+// one place: an absent or handle-less object answers CMPI_RC_ERR_INVALID_HANDLE, an exception
+// becomes a status, and the status pointer, which may be null, is written.
+
+#pragma once
+
+#include "host/broker/Object.h"
+#include "host/broker/Refusal.h"
+
+#include <cmpidt.h>
+#include <cmpift.h>
+
+#include <exception>
+#include <functional>
+#include <string>
+#include <string_view>
+#include <tuple>
+#include <type_traits>
+#include <utility>
+
+namespace Host {
+
+// A status whose message says why; without a message when no request could hold it.
+CMPIStatus makeStatus(CMPIrc code, const char* reason) noexcept;
+
+// What a slot answers when it has no value to give.
+template <typename Answer>
+constexpr Answer nothing() noexcept
+{
+    if constexpr (std::is_same_v<Answer, CMPIData>)
+        return CMPIData{CMPI_null, CMPI_nullValue | CMPI_notFound, {}};
+    else
+        return Answer();
+}
+
+namespace Detail {
+
+template <typename Function>
+struct SelfOf;
+template <typename Answer, typename Self, typename... Rest, bool nothrow>
+struct SelfOf<Answer (*)(Self&, Rest...) noexcept(nothrow)> {
+    using type = Self;
+};
+template <typename Answer, typename Self, typename... Rest, bool nothrow>
+struct SelfOf<Answer (Self::*)(Rest...) noexcept(nothrow)> {
+    using type = Self;
+};
+template <typename Answer, typename Self, typename... Rest, bool nothrow>
+struct SelfOf<Answer (Self::*)(Rest...) const noexcept(nothrow)> {
+    using type = Self;
+};
+
+// C++ answers as CMPI wants them: objects become handles, numbers the slot's type.
+template <typename Answer, typename Given>
+Answer answerOf(Given&& given)
+{
+    if constexpr (std::is_convertible_v<Given, Answer> && !std::is_arithmetic_v<Answer>)
+        return std::forward<Given>(given);
+    else if constexpr (std::is_arithmetic_v<Answer>)
+        return static_cast<Answer>(given);
+    else
+        return given.handle();
+}
+
+template <typename... Arguments>
+constexpr bool endsInStatus()
+{
+    if constexpr (sizeof...(Arguments) == 0)
+        return false;
+    else
+        return std::is_same_v<
+            std::tuple_element_t<sizeof...(Arguments) - 1, std::tuple<Arguments...>>, CMPIStatus*>;
+}
+
+// The trailing status pointer of a slot's arguments; null when there is none.
+template <typename... Arguments>
+CMPIStatus* statusOf(const std::tuple<Arguments...>& arguments)
+{
+    if constexpr (endsInStatus<Arguments...>())
+        return std::get<sizeof...(Arguments) - 1>(arguments);
+    else
+        return nullptr;
+}
+
+template <typename Answer>
+Answer refuse(CMPIStatus* status, CMPIrc code, const char* reason)
+{
+    const CMPIStatus outcome = makeStatus(code, reason);
+    if (status != nullptr)
+        *status = outcome;
+    if constexpr (std::is_same_v<Answer, CMPIStatus>)
+        return outcome;
+    else
+        return nothing<Answer>();
+}
+
+// A pointer to a slot's function; deduces a slot's signature from the table it is put into.
+template <typename Answer, typename... Arguments>
+using Pointer = Answer (*)(Arguments...);
+
+} // namespace Detail
+
+// The function is called with the slot's arguments except a trailing CMPIStatus*. It throws
+// Refusal to answer anything but CMPI_RC_OK.
+template <auto function>
+class Slot {
+    using Self = typename Detail::SelfOf<decltype(function)>::type;
+
+    template <typename Answer, typename Tuple, std::size_t... index>
+    static Answer invoke(Self& self, const Tuple& arguments, std::index_sequence<index...>)
+    {
+        using Given = decltype(std::invoke(function, self, std::get<index>(arguments)...));
+        if constexpr (std::is_void_v<Given>) {
+            std::invoke(function, self, std::get<index>(arguments)...);
+            return nothing<Answer>();
+        } else {
+            return Detail::answerOf<Answer, Given>(
+                std::invoke(function, self, std::get<index>(arguments)...));
+        }
+    }
+
+public:
+    template <typename Answer, typename Handle, typename... Arguments>
+    static Answer call(Handle* handle, Arguments... arguments)
+    {
+        constexpr std::size_t count =
+            sizeof...(Arguments) - (Detail::endsInStatus<Arguments...>() ? 1 : 0);
+        const std::tuple<Arguments...> all{arguments...};
+        CMPIStatus* const status = Detail::statusOf(all);
+        // Only standard exceptions: a cancelled thread unwinds with another kind.
+        try {
+            Self* const self = Self::of(handle);
+            if (self == nullptr)
+                throw Refusal(CMPI_RC_ERR_INVALID_HANDLE, "no object behind the handle");
+            if (status != nullptr)
+                *status = {CMPI_RC_OK, nullptr};
+            return invoke<Answer>(*self, all, std::make_index_sequence<count>{});
+        } catch (const Refusal& refusal) {
+            return Detail::refuse<Answer>(status, refusal.code(), refusal.what());
+        } catch (const std::exception& failure) {
+            return Detail::refuse<Answer>(status, CMPI_RC_ERR_FAILED, failure.what());
+        }
+    }
+
+    template <typename Answer, typename Handle, typename... Arguments>
+    constexpr operator Detail::Pointer<Answer, Handle*, Arguments...>() const noexcept
+    {
+        return &call<Answer, Handle, Arguments...>;
+    }
+};
+
+template <auto function>
+inline constexpr Slot<function> slot{};
+
+// For slots that the broker does not offer: they answer CMPI_RC_ERR_NOT_SUPPORTED.
+class NotOffered {
+    template <typename Answer, typename... Arguments>
+    static Answer call(Arguments... arguments)
+    {
+        return Detail::refuse<Answer>(Detail::statusOf(std::tuple<Arguments...>{arguments...}),
+            CMPI_RC_ERR_NOT_SUPPORTED, "not offered by this broker");
+    }
+
+public:
+    template <typename Answer, typename... Arguments>
+    constexpr operator Detail::Pointer<Answer, Arguments...>() const noexcept
+    {
+        return &call<Answer, Arguments...>;
+    }
+};
+
+inline constexpr NotOffered notOffered{};
+
+// The object behind a handle given as an argument. Throws Refusal
+// (CMPI_RC_ERR_INVALID_HANDLE) when there is none.
+template <typename Self>
+Self& required(const typename Self::Handle* handle)
+{
+    if (Self* const object = Self::of(handle))
+        return *object;
+    throw Refusal(CMPI_RC_ERR_INVALID_HANDLE,
+        std::string("no ") + Object::typeName(Self::kindOfSelf) + " behind the handle");
+}
+
+// A text given as an argument. Throws Refusal (CMPI_RC_ERR_INVALID_PARAMETER) for null.
+inline std::string_view requiredText(const char* text, const char* what)
+{
+    if (text == nullptr)
+        throw Refusal(CMPI_RC_ERR_INVALID_PARAMETER, std::string(what) + " is null");
+    return text;
+}
+
+} // namespace Host

@@ -1,0 +1,41 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// A text behind a CMPIString. Immutable, hence shared freely within its arena.
+
+#pragma once
+
+#include "host/broker/Object.h"
+
+#include <optional>
+#include <string_view>
+
+namespace Host {
+
+class String : public Encapsulated<String, CMPIString, Object::Kind::string> {
+public:
+    static String& make(Arena& arena, std::string_view text);
+    // A string object whose character pointer is null, as some object managers hand out for
+    // the host of a path.
+    static String& makeWithoutText(Arena& arena);
+
+    // Nothing when the character pointer is null.
+    std::optional<std::string_view> text() const noexcept
+    {
+        return text_.data() == nullptr ? std::nullopt : std::optional{text_};
+    }
+    // Zero-terminated, or null.
+    const char* characters() const noexcept { return text_.data(); }
+
+    // Itself when it lives there already.
+    String& copiedTo(Arena& arena) const;
+
+    static const CMPIStringFT functions;
+
+private:
+    friend class Arena;
+    String(Arena& home, std::string_view text) : Encapsulated(&home), text_(text) {}
+
+    std::string_view text_;
+};
+
+} // namespace Host

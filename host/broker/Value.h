@@ -1,0 +1,101 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// One value as the broker keeps it: a type, a state and the value itself.
+
+#pragma once
+
+#include <cmpidt.h>
+
+#include <cstdint>
+#include <optional>
+#include <string_view>
+
+namespace Host {
+
+class Arena;
+class Array;
+class DateTime;
+class Instance;
+class ObjectPath;
+class String;
+
+// Small and copied freely; a text, date-time, path, instance or array it refers to belongs
+// to the arena it was made in and is never changed through the value.
+class Value {
+public:
+    // How deep paths and instances may stand in one another. Quoting a path doubles the
+    // backslashes of what stands in it.
+    static constexpr unsigned maximumNesting = 8;
+
+    // A null value without a type.
+    constexpr Value() noexcept = default;
+
+    // A copy of what a provider hands over by address; of CMPI_chars, the text that the
+    // address itself is. A null address, text or object is a null value; CMPI_chars becomes
+    // CMPI_string. Throws Refusal: CMPI_RC_ERR_INVALID_DATA_TYPE for a type that a value
+    // cannot have, CMPI_RC_ERR_TYPE_MISMATCH for an array of another type,
+    // CMPI_RC_ERR_INVALID_HANDLE for a handle without an object,
+    // CMPI_RC_ERR_SERVER_LIMITS_EXCEEDED beyond the maximum nesting.
+    static Value from(Arena& arena, const void* value, CMPIType type);
+
+    static Value text(Arena& arena, std::string_view text);
+    static Value of(const String& string) noexcept;
+    static Value of(const DateTime& dateTime) noexcept;
+    static Value of(const ObjectPath& path) noexcept;
+    static Value of(const Instance& instance) noexcept;
+    static Value of(const Array& array) noexcept;
+    static Value boolean(bool value) noexcept;
+    // Of any CMPI integer type (and CMPI_char16), cut to its width.
+    static Value integer(CMPIType type, std::uint64_t value) noexcept;
+    static Value real(CMPIType type, double value) noexcept;
+    // Of any type that is no object and no text; reads no more bytes than the type has.
+    static Value plain(const void* value, CMPIType type) noexcept;
+    static Value null(CMPIType type) noexcept;
+    // What some object managers put where a client left out a key.
+    static Value absent() noexcept;
+
+    CMPIType type() const noexcept { return type_; }
+    CMPIValueState state() const noexcept { return state_; }
+    bool isNull() const noexcept { return (state_ & CMPI_nullValue) != 0; }
+
+    // Each answers nothing when the value is null or of another type.
+    std::optional<std::string_view> text() const noexcept;
+    std::optional<bool> boolean() const noexcept;
+    std::optional<std::uint64_t> unsignedInteger() const noexcept; // also CMPI_char16
+    std::optional<std::int64_t> signedInteger() const noexcept;
+    std::optional<double> real() const noexcept;
+    const String* string() const noexcept;
+    const DateTime* dateTime() const noexcept;
+    const ObjectPath* path() const noexcept;
+    const Instance* instance() const noexcept;
+    const Array* array() const noexcept;
+
+    // The value with all it refers to, living in the arena.
+    Value copiedTo(Arena& arena) const;
+
+    // What a provider gets to see; it may change the objects in it without changing the
+    // value. Throws Refusal when no request is active and there is an object to copy.
+    CMPIData handOut() const;
+    // The same objects, not copies of them.
+    CMPIData data() const noexcept;
+
+    // The same value, marked as a key's.
+    Value asKey() const noexcept;
+
+private:
+    Value(CMPIType type, const void* bits, std::size_t size) noexcept;
+    static Value ofHandle(CMPIType type, const void* handle, unsigned nesting = 0) noexcept;
+    template <typename Values>
+    static unsigned deepest(const Values& values) noexcept;
+    template <typename T>
+    T get() const noexcept;
+    template <typename Self>
+    const Self* object(CMPIType type) const noexcept;
+
+    CMPIType type_ = CMPI_null;
+    CMPIValueState state_ = CMPI_nullValue;
+    std::uint8_t nesting_ = 0; // paths and instances down from here
+    std::uint64_t bits_ = 0;   // the first bytes of a CMPIValue
+};
+
+} // namespace Host

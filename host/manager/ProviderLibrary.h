@@ -1,0 +1,57 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// A CMPI provider library in memory, and the management interfaces (MIs) it was asked for.
+
+#pragma once
+
+#include <cmpidt.h>
+#include <cmpift.h>
+
+#include <map>
+#include <memory>
+#include <string>
+
+namespace Host {
+
+class Broker;
+
+// Used by one thread at a time; the MIs it hands out may be called from any thread.
+class ProviderLibrary {
+public:
+    // Loads the file with its symbols kept to itself. The broker must outlive the library.
+    // Throws std::runtime_error with the loader's reason, which names the file.
+    ProviderLibrary(const Broker& broker, const std::string& file);
+    // Lets every MI clean up and unloads the library, unless an MI answers that it must stay:
+    // then it stays in memory until the process ends.
+    ~ProviderLibrary();
+    ProviderLibrary(const ProviderLibrary&) = delete;
+    ProviderLibrary& operator=(const ProviderLibrary&) = delete;
+
+    // The MI of the provider with that name, made at the first call; it belongs to the library
+    // and lasts as long as this object. Throw std::runtime_error naming the file when the
+    // library exports no such factory or its factory refuses.
+    CMPIInstanceMI& instanceMI(const std::string& provider);
+    CMPIAssociationMI& associationMI(const std::string& provider);
+
+private:
+    struct Unload {
+        void operator()(void* library) const noexcept;
+    };
+
+    template <typename MI>
+    MI& mi(std::map<std::string, MI*>& known, const std::string& factory);
+    template <typename MI>
+    MI* create(const std::string& factory) const;
+    bool cleanUp() noexcept;
+
+    const Broker& broker_;
+    std::string file_;
+    std::unique_ptr<void, Unload> library_;
+    std::map<std::string, CMPIInstanceMI*> instanceMIs_;
+    std::map<std::string, CMPIAssociationMI*> associationMIs_;
+};
+
+// The code and message of a status, for people: "code 1: At least one key should be passed".
+std::string describe(const CMPIStatus& status);
+
+} // namespace Host

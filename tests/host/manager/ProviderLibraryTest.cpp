@@ -1,0 +1,172 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "host/manager/ProviderLibrary.h"
+
+#include "host/broker/Broker.h"
+#include "host/broker/Request.h"
+#include "tests/host/manager/OddProvider.h"
+#include "tests/support/TemporaryFolder.h"
+
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+#include <dlfcn.h>
+
+#include <functional>
+#include <memory>
+#include <optional>
+#include <stdexcept>
+
+namespace {
+
+using testing::AllOf;
+using testing::HasSubstr;
+
+const std::string oddProvider = SENSOR_PROFILE_BINARY_DIR "/lib/libOddProvider.so";
+const std::string sensorProvider = SENSOR_PROFILE_BINARY_DIR "/lib/libSensorProfileProvider.so";
+
+bool isLoaded(const std::string& file)
+{
+    void* const library = ::dlopen(file.c_str(), RTLD_NOW | RTLD_NOLOAD);
+    if (library != nullptr)
+        ::dlclose(library);
+    return library != nullptr;
+}
+
+// Keeps the odd library in memory and asks it what happened.
+class Witness {
+public:
+    Witness() : library_(::dlopen(oddProvider.c_str(), RTLD_NOW | RTLD_LOCAL))
+    {
+        const auto report = ::dlsym(library_, "oddProviderReport");
+        report_ = reinterpret_cast<Testing::OddProviderReportFunction>(report);
+    }
+    ~Witness() { ::dlclose(library_); }
+    Witness(const Witness&) = delete;
+    Witness& operator=(const Witness&) = delete;
+
+    Testing::OddProviderReport report() const { return *report_(); }
+
+private:
+    void* library_;
+    Testing::OddProviderReportFunction report_ = nullptr;
+};
+
+std::string failureOf(const std::function<void()>& action)
+{
+    try {
+        action();
+    } catch (const std::runtime_error& error) {
+        return error.what();
+    }
+    return "no failure";
+}
+
+class ProviderLibraryTest : public testing::Test {
+protected:
+    Host::Broker broker_;
+};
+
+TEST_F(ProviderLibraryTest, IsInMemoryAsLongAsItsObjectLives)
+{
+    ASSERT_FALSE(isLoaded(oddProvider));
+    {
+        const Host::ProviderLibrary library(broker_, oddProvider);
+        EXPECT_TRUE(isLoaded(oddProvider));
+    }
+    EXPECT_FALSE(isLoaded(oddProvider));
+}
+
+TEST_F(ProviderLibraryTest, KeepsItsSymbolsToItself)
+{
+    const Host::ProviderLibrary library(broker_, oddProvider);
+    EXPECT_EQ(::dlsym(RTLD_DEFAULT, "oddProviderReport"), nullptr);
+}
+
+TEST_F(ProviderLibraryTest, MakesEachManagementInterfaceOnce)
+{
+    const Witness witness;
+    Host::ProviderLibrary library(broker_, oddProvider);
+    CMPIInstanceMI& first = library.instanceMI("Leaving");
+    EXPECT_EQ(&library.instanceMI("Leaving"), &first);
+    EXPECT_EQ(witness.report().created, 1);
+    EXPECT_EQ(library.associationMI("Leaving").ft->ftVersion, 200);
+    EXPECT_EQ(witness.report().created, 2);
+}
+
+TEST_F(ProviderLibraryTest, LetsEveryManagementInterfaceCleanUpWithAContext)
+{
+    const Witness witness;
+    {
+        Host::ProviderLibrary library(broker_, oddProvider);
+        library.instanceMI("Leaving");
+        library.associationMI("Leaving");
+        EXPECT_EQ(witness.report().cleanedUp, 0);
+    }
+    EXPECT_EQ(witness.report().cleanedUp, 2);
+    EXPECT_EQ(witness.report().cleanedUpWithContext, 2);
+}
+
+TEST_F(ProviderLibraryTest, StaysInMemoryWhenACleanupAsksForIt)
+{
+    // Under a name of its own, lest other tests find it in memory.
+    const Testing::TemporaryFolder folder;
+    const std::string copy = (folder.path() / "libStaying.so").string();
+    std::filesystem::copy_file(oddProvider, copy);
+    std::optional<Host::ProviderLibrary> library(std::in_place, broker_, copy);
+    library->instanceMI("Leaving");
+    library->instanceMI("Staying");
+    library.reset();
+    EXPECT_TRUE(isLoaded(copy));
+}
+
+TEST_F(ProviderLibraryTest, ReturnsTheSensorProvidersInterface)
+{
+    Host::ProviderLibrary library(broker_, sensorProvider);
+    EXPECT_STREQ(
+        library.instanceMI("SensorProfileProvider").ft->miName, "instanceSensorProfileProvider");
+    EXPECT_STREQ(library.associationMI("SensorSystemDeviceProvider").ft->miName,
+        "associationSensorSystemDeviceProvider");
+}
+
+TEST_F(ProviderLibraryTest, NamesAFileThatIsMissingOrNoLibrary)
+{
+    const Testing::TemporaryFolder folder;
+    const std::string text = folder.write("text.so", "no library");
+    EXPECT_THAT(failureOf([&] { Host::ProviderLibrary(broker_, "/no/such.so"); }),
+        AllOf(HasSubstr("/no/such.so"), HasSubstr("No such file")));
+    EXPECT_THAT(failureOf([&] { Host::ProviderLibrary(broker_, text); }), HasSubstr(text));
+}
+
+TEST_F(ProviderLibraryTest, NamesTheFactoryThatIsMissing)
+{
+    Host::ProviderLibrary library(broker_, oddProvider);
+    EXPECT_EQ(failureOf([&] { library.instanceMI("Absent"); }),
+        oddProvider + ": no factory Absent_Create_InstanceMI");
+    EXPECT_EQ(failureOf([&] { library.associationMI("Staying"); }),
+        oddProvider + ": no factory Staying_Create_AssociationMI");
+}
+
+TEST_F(ProviderLibraryTest, SaysWhyAFactoryRefuses)
+{
+    Host::ProviderLibrary library(broker_, oddProvider);
+    EXPECT_EQ(failureOf([&] { library.instanceMI("Refusing"); }),
+        oddProvider + ": Refusing_Create_InstanceMI answers code 2: not on this machine");
+    EXPECT_EQ(failureOf([&] { library.instanceMI("Empty"); }),
+        oddProvider + ": Empty_Create_InstanceMI answers with nothing");
+    EXPECT_EQ(failureOf([&] { library.instanceMI("Ancient"); }),
+        oddProvider + ": Ancient_Create_InstanceMI answers with a function table of version 86");
+}
+
+TEST_F(ProviderLibraryTest, DescribesAStatusWithAndWithoutMessage)
+{
+    const Host::Request request(broker_);
+    EXPECT_EQ(Host::describe({CMPI_RC_ERR_NOT_FOUND, nullptr}), "code 6");
+    CMPIString* const message =
+        broker_.handle()->eft->newString(broker_.handle(), "it is gone", nullptr);
+    EXPECT_EQ(Host::describe({CMPI_RC_ERR_NOT_FOUND, message}), "code 6: it is gone");
+    CMPIString handleless{};
+    EXPECT_EQ(Host::describe({CMPI_RC_ERR_NOT_FOUND, &handleless}), "code 6");
+}
+
+} // namespace

@@ -1,0 +1,159 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// Object managers unload providers that are idle and load them again at the next request, for
+// years: nothing may stay behind.
+
+#include "host/broker/Broker.h"
+#include "host/broker/CollectedResult.h"
+#include "host/broker/ObjectPath.h"
+#include "host/broker/Request.h"
+#include "host/broker/Result.h"
+#include "host/manager/ProviderLibrary.h"
+#include "tests/support/Environment.h"
+#include "tests/support/TemporaryFolder.h"
+
+#include <gtest/gtest.h>
+
+#include <dlfcn.h>
+#include <unistd.h>
+
+#include <algorithm>
+#include <filesystem>
+#include <fstream>
+#include <iterator>
+
+namespace {
+
+#if defined(__SANITIZE_ADDRESS__) || defined(__SANITIZE_THREAD__)
+constexpr bool isSanitized = true;
+#elif defined(__has_feature)
+constexpr bool isSanitized = __has_feature(address_sanitizer) || __has_feature(thread_sanitizer);
+#else
+constexpr bool isSanitized = false;
+#endif
+
+const std::string provider = SENSOR_PROFILE_BINARY_DIR "/lib/libSensorProfileProvider.so";
+
+constexpr const char* model = R"({ "nodes": [
+    { "type": "temperature", "path": "/board/temp1", "description": "Temp", "status": 1,
+      "baseUnits": 2, "reading": 41.5, "upperCritical": 95, "possibleStates": [1, 26] },
+    { "type": "voltage", "path": "/board/in1", "description": "+12V", "status": 1,
+      "baseUnits": 5, "reading": 12.1 },
+    { "type": "tachometer", "path": "/board/fan1", "description": "Fan", "status": 1,
+      "baseUnits": 19, "reading": 1200 } ] })";
+
+// One use of the provider from its loading to its unloading.
+void enumerate(std::size_t& count)
+{
+    Host::Broker broker;
+    Host::ProviderLibrary library(broker, provider);
+    Host::Request request(broker);
+    CMPIInstanceMI& mi = library.instanceMI("SensorProfileProvider");
+    Host::CollectedResult answer;
+    Host::Result result(answer);
+    const CMPIStatus status = mi.ft->enumerateInstances(&mi, request.context().handle(),
+        result.handle(), request.makePath("root/cimv2", "ZUMLO_NumericSensor").handle(), nullptr);
+    ASSERT_EQ(status.rc, CMPI_RC_OK);
+    count = answer.instances().size();
+}
+
+bool isLoaded()
+{
+    void* const library = ::dlopen(provider.c_str(), RTLD_NOW | RTLD_NOLOAD);
+    if (library != nullptr)
+        ::dlclose(library);
+    return library != nullptr;
+}
+
+// In bytes.
+std::size_t residentSize()
+{
+    std::size_t total = 0;
+    std::size_t resident = 0;
+    std::ifstream("/proc/self/statm") >> total >> resident;
+    return resident * static_cast<std::size_t>(::sysconf(_SC_PAGESIZE));
+}
+
+std::size_t lines(const char* file)
+{
+    std::ifstream in(file);
+    return static_cast<std::size_t>(
+        std::count(std::istreambuf_iterator<char>(in), std::istreambuf_iterator<char>(), '\n'));
+}
+
+std::size_t openDescriptors()
+{
+    const std::filesystem::directory_iterator descriptors("/proc/self/fd");
+    return static_cast<std::size_t>(std::distance(begin(descriptors), end(descriptors)));
+}
+
+class Unload : public testing::Test {
+protected:
+    // Uses the provider over and over on the machine that the setting names.
+    void useManyTimes(const std::string& instrumentation, std::size_t sensors)
+    {
+        constexpr int uses = isSanitized ? 100 : 1000;
+        constexpr int warmUp = uses / 10;
+        constexpr std::size_t tolerance = std::size_t{1} << 20; // a kilobyte a use would be more
+        const Testing::EnvironmentVariable machine("VORN_INSTRUMENTATION", instrumentation);
+        const Testing::EnvironmentVariable level("RYNLOG_LEVEL", "3000");
+        const Testing::EnvironmentVariable log("RYNLOG_LOG", "file:" + path("log"));
+        const Testing::EnvironmentVariable trace("RYNLOG_TRACE", "file:" + path("trace"));
+
+        use(warmUp, sensors);
+        const std::size_t sizeBefore = residentSize();
+        const std::size_t mappingsBefore = lines("/proc/self/maps");
+        const std::size_t descriptorsBefore = openDescriptors();
+        use(uses - warmUp, sensors);
+
+        EXPECT_FALSE(isLoaded());
+        EXPECT_EQ(openDescriptors(), descriptorsBefore);
+        EXPECT_GT(std::filesystem::file_size(path("trace")), 0U);
+        if (isSanitized)
+            return; // a sanitizer's own bookkeeping grows
+        EXPECT_LE(residentSize(), sizeBefore + tolerance);
+        EXPECT_LE(lines("/proc/self/maps"), mappingsBefore + 2);
+    }
+
+    std::string path(const char* name) const { return (folder_.path() / name).string(); }
+
+    Testing::TemporaryFolder folder_;
+
+private:
+    static void use(int times, std::size_t sensors)
+    {
+        for (int i = 0; i < times; ++i) {
+            std::size_t count = 0;
+            ASSERT_NO_FATAL_FAILURE(enumerate(count));
+            ASSERT_EQ(count, sensors);
+        }
+    }
+};
+
+TEST_F(Unload, ProviderLeavesMemoryAfterOneUse)
+{
+    const Testing::EnvironmentVariable machine(
+        "VORN_INSTRUMENTATION", "model:" + folder_.write("model.json", model));
+    std::size_t count = 0;
+    ASSERT_NO_FATAL_FAILURE(enumerate(count));
+    EXPECT_EQ(count, 3U);
+    EXPECT_FALSE(isLoaded());
+}
+
+TEST_F(Unload, ThousandUsesOnAModelLeaveNothingBehind)
+{
+    useManyTimes("model:" + folder_.write("model.json", model), 3);
+}
+
+// Together with the machine's own sensors, of which there may be none.
+TEST_F(Unload, ThousandUsesOnThisMachineLeaveNothingBehind)
+{
+    std::size_t sensors = 0;
+    {
+        const Testing::EnvironmentVariable machine("VORN_INSTRUMENTATION", "hwmon");
+        ASSERT_NO_FATAL_FAILURE(enumerate(sensors));
+    }
+    useManyTimes("hwmon,model:" + folder_.write("model.json", model), sensors + 3);
+}
+
+} // namespace
