@@ -1,0 +1,68 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// The machine that people are shown when their own has no sensors. The golden output is what
+// `COLUMNS=80 sensorctl list --model schema/demo-model.json` prints.
+
+#include "tests/tools/ToolTest.h"
+#include "tools/output/Utf8.h"
+
+#include <gmock/gmock.h>
+
+#include <algorithm>
+
+namespace {
+
+using nlohmann::json;
+using namespace Testing;
+
+const std::string demonstration = SENSOR_PROFILE_SOURCE_DIR "/schema/demo-model.json";
+const std::string golden = SENSOR_PROFILE_SOURCE_DIR "/tests/data/tools/demonstration-list.txt";
+
+TEST(Demonstration, ListIsTheGoldenOutput)
+{
+    const Ended ended =
+        run({"list", "--model", demonstration}, {.environment = {{"COLUMNS", "80"}}});
+    EXPECT_EQ(ended.code, 0);
+    EXPECT_EQ(ended.err, "");
+    EXPECT_EQ(ended.out, contentOf(golden));
+}
+
+TEST(Demonstration, ListFitsATerminalWithoutCuttingNames)
+{
+    const Ended ended = runOnTerminal({"list", "--model", demonstration, "--color=never"}, 80);
+    EXPECT_THAT(ended.out, testing::Not(testing::HasSubstr("…")));
+    for (std::string line : linesOf(ended.out)) {
+        std::erase(line, '\r');
+        EXPECT_LE(Tools::displayWidth(line), 80U) << line;
+    }
+}
+
+TEST(Demonstration, DocumentHoldsEveryNodeOfTheFile)
+{
+    const json file = json::parse(contentOf(demonstration));
+    const json document = json::parse(run({"list", "--json", "--model", demonstration}).out);
+    EXPECT_EQ(document["instances"].size(), file["nodes"].size());
+}
+
+TEST(Demonstration, EverySensorCanBeFetchedByItsId)
+{
+    const json document = json::parse(run({"list", "--json", "--model", demonstration}).out);
+    for (const json& instance : document["instances"]) {
+        const std::string id = instance["properties"]["DeviceID"];
+        const Ended ended = run({"get", id, "--json", "--model", demonstration});
+        EXPECT_EQ(ended.code, 0) << id;
+        EXPECT_EQ(json::parse(ended.out)["instances"], json::array({instance}));
+    }
+}
+
+TEST(Demonstration, RecordReplaysToTheSameOutput)
+{
+    const TemporaryFolder folder;
+    const std::string file = (folder.path() / "record.json").string();
+    ASSERT_EQ(run({"record", "--model", demonstration, "-o", file}).code, 0);
+    for (const char* const form : {"--json", "--color=never"})
+        EXPECT_EQ(run({"list", form, "--model", file}).out,
+            run({"list", form, "--model", demonstration}).out);
+}
+
+} // namespace

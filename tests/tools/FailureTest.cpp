@@ -1,0 +1,154 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "tests/tools/ToolTest.h"
+
+#include <gmock/gmock.h>
+
+#include <csignal>
+
+namespace {
+
+using testing::AllOf;
+using testing::EndsWith;
+using testing::HasSubstr;
+using testing::StartsWith;
+using namespace Testing;
+
+class FailureTest : public ToolTest {
+protected:
+    std::vector<std::vector<std::string>> everyCommand() const
+    {
+        const std::string file = smallModel();
+        return {{"list", "--model", file}, {"list", "--json", "--model", file},
+            {"get", "CPU 1", "--model", file}, {"record", "--model", file}, {"--help"},
+            {"--version"}};
+    }
+};
+
+TEST_F(FailureTest, FullDiskIsSaid)
+{
+    for (const auto& arguments : everyCommand()) {
+        const Ended ended = run(arguments, {.out = RunOptions::Out::file, .outFile = "/dev/full"});
+        EXPECT_EQ(ended.code, 1) << testing::PrintToString(arguments);
+        EXPECT_EQ(ended.err, "sensorctl: cannot write the output: No space left on device\n");
+    }
+}
+
+TEST_F(FailureTest, ClosedStandardOutputIsSaid)
+{
+    for (const auto& arguments : everyCommand()) {
+        const Ended ended = run(arguments, {.out = RunOptions::Out::closed});
+        EXPECT_EQ(ended.code, 1) << testing::PrintToString(arguments);
+        EXPECT_EQ(ended.err, "sensorctl: cannot write the output: Bad file descriptor\n");
+    }
+}
+
+TEST_F(FailureTest, ReaderThatGoesAwayEndsTheToolBySignal)
+{
+    for (const auto& arguments : everyCommand()) {
+        const Ended ended = run(arguments, {.out = RunOptions::Out::abandonedPipe});
+        EXPECT_EQ(ended.signal, SIGPIPE) << testing::PrintToString(arguments);
+        EXPECT_EQ(ended.err, "");
+    }
+}
+
+TEST_F(FailureTest, ReaderThatGoesAwayIsSaidWhereTheSignalIsIgnored)
+{
+    const auto before = std::signal(SIGPIPE, SIG_IGN); // inherited
+    const Ended ended =
+        run({"list", "--model", smallModel()}, {.out = RunOptions::Out::abandonedPipe});
+    std::signal(SIGPIPE, before);
+    EXPECT_EQ(ended.code, 1);
+    EXPECT_EQ(ended.err, "sensorctl: cannot write the output: Broken pipe\n");
+}
+
+TEST_F(FailureTest, BadModelNamesFilePlaceAndReason)
+{
+    const std::string file = folder_.write(
+        "bad.json", R"({ "nodes": [ { "type": "voltage", "path": "/a", "description": 5 } ] })");
+    for (const std::string command : {"list", "record"}) {
+        const Ended ended = run({command, "--model", file});
+        EXPECT_EQ(ended.code, 1);
+        EXPECT_EQ(ended.out, "");
+        EXPECT_THAT(ended.err,
+            AllOf(StartsWith("sensorctl: "), HasSubstr(file), HasSubstr("/nodes/0/description")));
+        EXPECT_EQ(linesOf(ended.err).size(), 1U) << ended.err;
+    }
+}
+
+TEST_F(FailureTest, EveryKindOfBadModelIsAFailure)
+{
+    const std::vector<std::string> files = {"/no/such/model.json", folder_.path().string(),
+        "/dev/null", folder_.write("empty.json", ""), folder_.write("cut.json", R"({"nodes": [)"),
+        folder_.write("nul.json", std::string("{\"nodes\": []}\0", 14)),
+        folder_.write("array.json", "[]"),
+        folder_.write("member.json", R"({"nodes": [], "more": 1})")};
+    for (const std::string& file : files) {
+        const Ended ended = run({"list", "--json", "--model", file});
+        EXPECT_EQ(ended.code, 1) << file;
+        EXPECT_EQ(ended.out, "");
+        EXPECT_THAT(ended.err, AllOf(StartsWith("sensorctl: "), HasSubstr(file)));
+    }
+}
+
+TEST_F(FailureTest, InstrumentationThatCannotBeUsedIsTheReason)
+{
+    for (const std::vector<std::string>& arguments : std::vector<std::vector<std::string>>{
+             {"list"}, {"list", "--json"}, {"get", "CPU 1"}, {"record"}}) {
+        const Ended ended = run(arguments, {.environment = {{"VORN_INSTRUMENTATION", "abacus"}}});
+        EXPECT_EQ(ended.code, 1);
+        EXPECT_EQ(ended.out, "");
+        EXPECT_THAT(
+            linesOf(ended.err).back(), AllOf(StartsWith("sensorctl: "), HasSubstr("\"abacus\"")));
+    }
+}
+
+TEST_F(FailureTest, SensorsThatTheProviderRefusesAreTheReason)
+{
+    const std::string file =
+        model(R"({ "type": "voltage", "path": "/board/in1", "description": "" })");
+    const Ended ended = run({"list", "--model", file});
+    EXPECT_EQ(ended.code, 1);
+    EXPECT_EQ(ended.out, "");
+    EXPECT_THAT(ended.err, EndsWith("sensorctl: the machine has 1 sensors, of which the provider "
+                                    "shows none: /board/in1 has no description\n"));
+}
+
+TEST_F(FailureTest, ToolWithoutItsProviderSaysWhereItLooked)
+{
+    std::filesystem::create_directory(folder_.path() / "bin");
+    const std::string moved = (folder_.path() / "bin" / "sensorctl").string();
+    std::filesystem::copy_file(sensorctl, moved);
+    const Ended ended = run({"list", "--model", smallModel()}, {.program = moved});
+    EXPECT_EQ(ended.code, 1);
+    EXPECT_THAT(ended.err,
+        AllOf(StartsWith("sensorctl: libSensorProfileProvider.so is in none of "),
+            HasSubstr(folder_.path().string() + "/lib/cmpi,"), HasSubstr("--provider FILE")));
+}
+
+TEST_F(FailureTest, InstalledToolFindsItsProviderByItsOwnPlace)
+{
+    const std::string library = SENSOR_PROFILE_BINARY_DIR "/lib/libSensorProfileProvider.so";
+    std::filesystem::create_directories(folder_.path() / "bin");
+    const std::string moved = (folder_.path() / "bin" / "sensorctl").string();
+    std::filesystem::copy_file(sensorctl, moved);
+    for (const char* const place : {"lib", "lib/cmpi"}) {
+        std::filesystem::create_directories(folder_.path() / place);
+        const auto copy = folder_.path() / place / "libSensorProfileProvider.so";
+        std::filesystem::copy_file(library, copy);
+        EXPECT_EQ(run({"list", "--model", smallModel()}, {.program = moved}).code, 0);
+        std::filesystem::remove(copy);
+    }
+}
+
+TEST_F(FailureTest, ProviderOptionTakesAnyPath)
+{
+    const std::string library = SENSOR_PROFILE_BINARY_DIR "/lib/libSensorProfileProvider.so";
+    const std::string relative = std::filesystem::relative(library).string();
+    EXPECT_EQ(run({"list", "--model", smallModel(), "--provider", relative}).code, 0);
+    const Ended ended = run({"list", "--model", smallModel(), "--provider", "libc.so.6"});
+    EXPECT_EQ(ended.code, 1); // looked for here, not among the system's libraries
+    EXPECT_THAT(ended.err, HasSubstr("/libc.so.6: cannot open shared object file"));
+}
+
+} // namespace

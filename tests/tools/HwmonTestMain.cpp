@@ -1,0 +1,12 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "tests/support/MountNamespace.h"
+
+#include <gmock/gmock.h>
+
+int main(int argc, char** argv)
+{
+    Testing::enterMountNamespace(argv);
+    testing::InitGoogleMock(&argc, argv);
+    return RUN_ALL_TESTS();
+}

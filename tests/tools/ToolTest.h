@@ -1,0 +1,64 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// What tests that run the tool share.
+
+#pragma once
+
+#include "tests/support/TemporaryFolder.h"
+#include "tests/tools/ChildProcess.h"
+
+#include <gtest/gtest.h>
+#include <nlohmann/json.hpp>
+
+#include <fstream>
+#include <iterator>
+#include <sstream>
+#include <string>
+#include <vector>
+
+namespace Testing {
+
+inline std::string contentOf(const std::filesystem::path& file)
+{
+    std::ifstream in(file, std::ios::binary);
+    return {std::istreambuf_iterator<char>(in), std::istreambuf_iterator<char>()};
+}
+
+inline std::vector<std::string> linesOf(const std::string& text)
+{
+    std::istringstream in(text);
+    std::vector<std::string> lines;
+    for (std::string line; std::getline(in, line);)
+        lines.push_back(line);
+    return lines;
+}
+
+class ToolTest : public ::testing::Test {
+protected:
+    // A model file with these nodes, written as JSON.
+    std::string model(const std::string& nodes) const
+    {
+        return folder_.write("model.json", "{ \"nodes\": [" + nodes + "] }");
+    }
+
+    // One node of each type, in good and bad states.
+    std::string smallModel() const
+    {
+        return model(R"(
+            { "type": "temperature", "path": "/cpu0/temp1", "description": "CPU 1", "status": 1,
+              "possibleStates": [1, 26], "baseUnits": 2, "reading": 41.5, "lowerNonCritical": 5,
+              "upperNonCritical": 80, "upperCritical": 95, "lowerFatal": -10, "upperFatal": 105 },
+            { "type": "temperature", "path": "/cpu1/temp1", "description": "CPU 2", "status": 26,
+              "baseUnits": 2, "reading": 97, "upperCritical": 95 },
+            { "type": "voltage", "path": "/board/in1", "description": "+12V", "status": 23,
+              "baseUnits": 5, "reading": 12.75, "lowerCritical": 10.5, "upperNonCritical": 12.5 },
+            { "type": "tachometer", "path": "/board/fan1", "description": "Fan", "status": 1,
+              "baseUnits": 19, "reading": 1200, "lowerNonCritical": 300 },
+            { "type": "tachometer", "path": "/board/fan2", "description": "Fan", "status": 13,
+              "baseUnits": 19 })");
+    }
+
+    TemporaryFolder folder_;
+};
+
+} // namespace Testing

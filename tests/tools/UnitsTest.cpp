@@ -1,0 +1,126 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "tools/cim/Units.h"
+
+#include "tools/cim/ValueMaps.h"
+
+#include <gtest/gtest.h>
+
+#include <cstdint>
+#include <limits>
+
+namespace {
+
+using namespace Tools;
+
+TEST(Scaled, AppliesThePowerOfTen)
+{
+    EXPECT_EQ(scaled(12345, -3), "12.345");
+    EXPECT_EQ(scaled(41, 0), "41");
+    EXPECT_EQ(scaled(12, 2), "1200");
+    EXPECT_EQ(scaled(-12345, -3), "-12.345");
+}
+
+TEST(Scaled, FillsUpWithZeros)
+{
+    EXPECT_EQ(scaled(0, -3), "0.000");
+    EXPECT_EQ(scaled(5, -3), "0.005");
+    EXPECT_EQ(scaled(-5, -3), "-0.005");
+    EXPECT_EQ(scaled(-345, -3), "-0.345");
+    EXPECT_EQ(scaled(0, 4), "0");
+}
+
+TEST(Scaled, KnowsTheExtremes)
+{
+    EXPECT_EQ(scaled(std::numeric_limits<std::int32_t>::min(), -3), "-2147483.648");
+    EXPECT_EQ(scaled(std::numeric_limits<std::int64_t>::min(), -18), "-9.223372036854775808");
+    EXPECT_EQ(scaled(7, std::numeric_limits<std::int32_t>::min()), "7e-2147483648");
+    EXPECT_EQ(scaled(7, 40), "7e40");
+}
+
+TEST(ScaledToHundredths, RoundsFractions)
+{
+    EXPECT_EQ(scaledToHundredths(12599, -3), "12.60");
+    EXPECT_EQ(scaledToHundredths(3134, -3), "3.13");
+    EXPECT_EQ(scaledToHundredths(3135, -3), "3.14");
+    EXPECT_EQ(scaledToHundredths(-12599, -3), "-12.60");
+    EXPECT_EQ(scaledToHundredths(-12504, -3), "-12.50");
+    EXPECT_EQ(scaledToHundredths(1234567, -6), "1.23");
+    EXPECT_EQ(scaledToHundredths(9999, -3), "10.00");
+}
+
+TEST(ScaledToHundredths, LeavesTheRestAlone)
+{
+    EXPECT_EQ(scaledToHundredths(1500, 0), "1500");
+    EXPECT_EQ(scaledToHundredths(125, -1), "12.5");
+    EXPECT_EQ(scaledToHundredths(12, 2), "1200");
+    EXPECT_EQ(scaledToHundredths(5, -3), "0.005");
+    EXPECT_EQ(scaledToHundredths(-999, -3), "-0.999");
+    EXPECT_EQ(scaledToHundredths(0, -3), "0.000");
+    EXPECT_EQ(scaledToHundredths(7, -40), "7e-40");
+}
+
+TEST(WithoutTrailingZeros, TouchesFractionsOnly)
+{
+    EXPECT_EQ(withoutTrailingZeros("12.500"), "12.5");
+    EXPECT_EQ(withoutTrailingZeros("12.000"), "12");
+    EXPECT_EQ(withoutTrailingZeros("0.000"), "0");
+    EXPECT_EQ(withoutTrailingZeros("1200"), "1200");
+    EXPECT_EQ(withoutTrailingZeros("7e-20"), "7e-20");
+}
+
+TEST(UnitSymbol, HasTheCommonSymbols)
+{
+    EXPECT_EQ(unitSymbol(2), "°C");
+    EXPECT_EQ(unitSymbol(5), "V");
+    EXPECT_EQ(unitSymbol(19), "RPM");
+    EXPECT_EQ(unitSymbol(65), "%");
+}
+
+TEST(UnitSymbol, IsTheValueMapsTextElsewhere)
+{
+    EXPECT_EQ(unitSymbol(18), "CFM");
+    EXPECT_EQ(unitSymbol(51), "Moles");
+}
+
+TEST(UnitSymbol, IsEmptyWhereNoUnitIsKnown)
+{
+    for (const std::uint64_t code : {0U, 1U, 67U, 65535U})
+        EXPECT_EQ(unitSymbol(code), "") << code;
+}
+
+TEST(ValueMaps, KnowTheirFirstAndLastCodes)
+{
+    struct Expected {
+        const char* property;
+        std::uint64_t code;
+        const char* text;
+    };
+    for (const Expected& expected :
+        {Expected{"SensorType", 0, "Unknown"}, Expected{"SensorType", 5, "Tachometer"},
+            Expected{"SensorType", 16, "Intrusion"}, Expected{"BaseUnits", 2, "Degrees C"},
+            Expected{"BaseUnits", 19, "RPM"}, Expected{"BaseUnits", 37, "Steradians"},
+            Expected{"BaseUnits", 53, "PPM (parts/million)"}, Expected{"BaseUnits", 66, "Pascals"},
+            Expected{"RateUnits", 0, "None"}, Expected{"RateUnits", 9, "Per Year"},
+            Expected{"EnabledState", 3, "Disabled"}, Expected{"EnabledState", 10, "Starting"},
+            Expected{"RequestedState", 2, "Enabled"},
+            Expected{"RequestedState", 12, "Not Applicable"}, Expected{"HealthState", 5, "OK"},
+            Expected{"HealthState", 25, "Critical failure"},
+            Expected{"HealthState", 30, "Non-recoverable error"},
+            Expected{"OperationalStatus", 13, "Lost Communication"},
+            Expected{"OperationalStatus", 19, "Relocating"},
+            Expected{"SupportedThresholds", 5, "UpperThresholdFatal"},
+            Expected{"SettableThresholds", 0, "LowerThresholdNonCritical"}})
+        EXPECT_EQ(meaningOf(expected.property, expected.code), expected.text) << expected.property;
+}
+
+TEST(ValueMaps, HaveNoTextForOtherCodesAndProperties)
+{
+    EXPECT_EQ(meaningOf("SensorType", 17), "");
+    EXPECT_EQ(meaningOf("HealthState", 6), "");
+    EXPECT_EQ(meaningOf("RequestedState", 1), "");
+    EXPECT_EQ(meaningOf("OperationalStatus", std::numeric_limits<std::uint64_t>::max()), "");
+    EXPECT_EQ(meaningOf("UnitModifier", 0), "");
+}
+
+} // namespace

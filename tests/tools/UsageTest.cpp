@@ -1,0 +1,66 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "tests/tools/ToolTest.h"
+
+#include <gmock/gmock.h>
+
+namespace {
+
+using testing::AllOf;
+using testing::HasSubstr;
+using testing::MatchesRegex;
+using testing::StartsWith;
+using namespace Testing;
+
+TEST(Usage, HelpGoesToStandardOutput)
+{
+    const Ended ended = run({"--help"});
+    EXPECT_EQ(ended.code, 0);
+    EXPECT_EQ(ended.err, "");
+    EXPECT_THAT(ended.out,
+        AllOf(HasSubstr("list"), HasSubstr("get"), HasSubstr("record"), HasSubstr("Exit codes")));
+}
+
+TEST(Usage, EveryCommandHasItsHelp)
+{
+    for (const char* const command : {"list", "get", "record"}) {
+        const Ended ended = run({command, "--help"});
+        EXPECT_EQ(ended.code, 0);
+        EXPECT_THAT(ended.out, HasSubstr(std::string("sensorctl ") + command));
+    }
+}
+
+TEST(Usage, HelpFitsIntoEightyColumns)
+{
+    for (const std::vector<std::string>& arguments : std::vector<std::vector<std::string>>{
+             {"--help"}, {"list", "--help"}, {"get", "--help"}, {"record", "--help"}})
+        for (const std::string& line : linesOf(run(arguments).out))
+            EXPECT_LE(line.size(), 80U) << line;
+}
+
+TEST(Usage, VersionNamesTheToolAndTheInterface)
+{
+    const Ended ended = run({"--version"});
+    EXPECT_EQ(ended.code, 0);
+    EXPECT_THAT(ended.out, MatchesRegex("sensorctl [0-9]+\\.[0-9]+\\.[0-9]+ \\(CMPI 2\\.0\\)\n"));
+}
+
+TEST(Usage, WrongUsageIsSaidAndEndsWithTwo)
+{
+    for (const std::vector<std::string>& arguments : std::vector<std::vector<std::string>>{{},
+             {"frobnicate"}, {"list", "extra"}, {"list", "--frobnicate"}, {"list", "--model"},
+             {"list", "--color", "blue"}, {"get"}, {"get", "one", "two"}, {"record", "extra"}}) {
+        const Ended ended = run(arguments);
+        EXPECT_EQ(ended.code, 2) << testing::PrintToString(arguments);
+        EXPECT_EQ(ended.out, "");
+        EXPECT_THAT(ended.err, StartsWith("sensorctl: "));
+        EXPECT_EQ(linesOf(ended.err).size(), 1U) << ended.err;
+    }
+}
+
+TEST(Usage, WhatWasTypedIsNotObeyedByTheTerminal)
+{
+    EXPECT_THAT(run({"\x1B[31m"}).err, HasSubstr("\\x1B[31m"));
+}
+
+} // namespace

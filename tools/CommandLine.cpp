@@ -1,0 +1,110 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "tools/CommandLine.h"
+
+#include "tools/Command.h"
+#include "tools/commands/Commands.h"
+#include "tools/output/Output.h"
+
+#include <CLI/CLI.hpp>
+
+#include <cmpidt.h>
+
+#include <unistd.h>
+
+#include <algorithm>
+#include <cstddef>
+#include <exception>
+#include <memory>
+#include <string>
+#include <vector>
+
+namespace Tools {
+
+namespace {
+
+constexpr std::size_t columnOfDescriptions = 22; // in the help
+
+constexpr const char* footer = "Exit codes: 0 success, 1 failure, 2 wrong usage, 3 nothing found.\n"
+                               "`sensorctl COMMAND --help` tells more about a command.";
+
+// CMPI counts its versions in hundreds.
+std::string versionText()
+{
+    constexpr int cmpi = CMPI_VERSION;
+    return "sensorctl " SENSOR_PROFILE_VERSION " (CMPI " + std::to_string(cmpi / 100) + "." +
+           std::to_string(cmpi % 100 / 10) + ")";
+}
+
+using Commands = std::vector<std::unique_ptr<Command>>;
+
+Commands addCommands(CLI::App& tool)
+{
+    Commands commands;
+    commands.push_back(makeListCommand(tool));
+    commands.push_back(makeGetCommand(tool));
+    commands.push_back(makeRecordCommand(tool));
+    return commands;
+}
+
+ExitCode refuse(const std::string& reason)
+{
+    complain(reason + " (sensorctl --help says what is possible)");
+    return ExitCode::wrongUsage;
+}
+
+ExitCode runChosen(const Commands& commands, Output& out)
+{
+    const auto chosen = std::find_if(commands.begin(), commands.end(),
+        [](const std::unique_ptr<Command>& command) { return command->isChosen(); });
+    if (chosen == commands.end())
+        return refuse("a command is missing");
+    const ExitCode code = (*chosen)->run(out);
+    out.flush();
+    return code;
+}
+
+ExitCode print(Output& out, const std::string& text)
+{
+    out.write(text);
+    out.flush();
+    return ExitCode::success;
+}
+
+ExitCode run(int argc, const char* const* argv)
+{
+    CLI::App tool(
+        "Shows the hardware sensors of this machine as CIM clients see them.", "sensorctl");
+    tool.set_version_flag("--version", versionText(), "Print the version and exit");
+    tool.require_subcommand(0, 1); // none is complained of here, in plainer words
+    tool.get_formatter()->label("SUBCOMMAND", "COMMAND");
+    tool.get_formatter()->column_width(columnOfDescriptions);
+    tool.footer(footer);
+    const Commands commands = addCommands(tool);
+    Output out(STDOUT_FILENO);
+    try {
+        tool.parse(argc, argv);
+    } catch (const CLI::CallForHelp&) {
+        return print(out, tool.help());
+    } catch (const CLI::CallForVersion& version) {
+        return print(out, version.what() + std::string("\n"));
+    } catch (const CLI::ParseError& error) {
+        return refuse(error.what());
+    }
+    return runChosen(commands, out);
+}
+
+} // namespace
+
+int runTool(int argc, const char* const* argv)
+{
+    reserveStandardStreams();
+    try {
+        return static_cast<int>(run(argc, argv));
+    } catch (const std::exception& error) {
+        complain(error.what());
+        return static_cast<int>(ExitCode::failure);
+    }
+}
+
+} // namespace Tools

@@ -1,0 +1,60 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "tools/EmptyMachine.h"
+
+#include "platform/instrumentation/Instrumentation.h"
+#include "tools/output/Output.h"
+
+#include <stdexcept>
+
+namespace Tools {
+
+using Vorn::NodeLexicon::NodeType;
+
+namespace {
+
+struct Look {
+    std::size_t count = 0;
+    std::string nameless; // a sensor without a description, which no provider accepts
+};
+
+Look lookAtMachine()
+{
+    Look look;
+    for (const NodeType type : {NodeType::Temperature, NodeType::Voltage, NodeType::Tachometer}) {
+        Vorn::Instrumentation cursor;
+        for (cursor.selectNode(type); cursor; ++cursor, ++look.count)
+            if (look.nameless.empty() && cursor.getNodeDescription().empty())
+                look.nameless = cursor.convertPathToString(cursor.getPathToNode());
+    }
+    return look;
+}
+
+} // namespace
+
+std::size_t countSensors()
+{
+    return lookAtMachine().count;
+}
+
+void checkMachineIsEmpty()
+{
+    const Look look = lookAtMachine();
+    if (look.count == 0)
+        return;
+    const std::string reason =
+        look.nameless.empty() ? "" : ": " + look.nameless + " has no description";
+    throw std::runtime_error("the machine has " + std::to_string(look.count) +
+                             " sensors, of which the provider shows none" + reason);
+}
+
+ExitCode complainOfEmptyMachine(const std::optional<std::string>& model)
+{
+    if (model)
+        complain(*model + ": this machine has no sensors");
+    else
+        complain("this machine has no sensors (--model FILE shows one that a file describes)");
+    return ExitCode::nothingFound;
+}
+
+} // namespace Tools

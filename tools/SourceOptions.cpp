@@ -1,0 +1,43 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "tools/SourceOptions.h"
+
+#include "platform/instrumentation/ModelFile.h"
+#include "tools/cim/ProviderFile.h"
+
+#include <CLI/CLI.hpp>
+
+#include <cstdlib>
+#include <filesystem>
+
+namespace Tools {
+
+void SourceOptions::addModel(CLI::App& parser)
+{
+    parser.add_option("--model", model_, "The machine this model file describes")
+        ->type_name("FILE");
+}
+
+void SourceOptions::addProvider(CLI::App& parser)
+{
+    parser.add_option("--provider", provider_, "This provider library instead of the tool's own")
+        ->type_name("FILE");
+}
+
+void SourceOptions::selectMachine() const
+{
+    if (!model_)
+        return;
+    // The provider would answer a model it cannot read with nothing.
+    Vorn::checkModelFile(*model_);
+    const std::string entry = Vorn::modelFileEntry(std::filesystem::absolute(*model_).string());
+    ::setenv("VORN_INSTRUMENTATION", entry.c_str(), 1);
+}
+
+std::string SourceOptions::providerFile() const
+{
+    // With its folder, lest the loader search for it.
+    return provider_ ? std::filesystem::absolute(*provider_).string() : findProviderFile();
+}
+
+} // namespace Tools

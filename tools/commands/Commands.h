@@ -1,0 +1,17 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// The subcommands, each in a file of its own.
+
+#pragma once
+
+#include "tools/Command.h"
+
+#include <memory>
+
+namespace Tools {
+
+std::unique_ptr<Command> makeListCommand(CLI::App& tool);
+std::unique_ptr<Command> makeGetCommand(CLI::App& tool);
+std::unique_ptr<Command> makeRecordCommand(CLI::App& tool);
+
+} // namespace Tools

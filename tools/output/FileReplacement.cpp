@@ -1,0 +1,115 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "tools/output/FileReplacement.h"
+
+#include "tools/output/Output.h"
+
+#include <fcntl.h>
+#include <sys/stat.h>
+#include <unistd.h>
+
+#include <cerrno>
+#include <cstdlib>
+#include <filesystem>
+#include <stdexcept>
+#include <system_error>
+
+namespace Tools {
+
+namespace {
+
+void check(int answer)
+{
+    if (answer == -1)
+        throw std::system_error(errno, std::generic_category());
+}
+
+class Descriptor {
+public:
+    explicit Descriptor(int number) : number_(number) { check(number); }
+    ~Descriptor()
+    {
+        if (number_ != -1)
+            ::close(number_);
+    }
+    Descriptor(const Descriptor&) = delete;
+    Descriptor& operator=(const Descriptor&) = delete;
+
+    int number() const { return number_; }
+
+    // Closing is where some file systems first say that the disk is full.
+    void close()
+    {
+        const int number = number_;
+        number_ = -1;
+        check(::close(number));
+    }
+
+private:
+    int number_;
+};
+
+// A file beside the target, removed again unless it takes the target's place.
+class Replacement {
+public:
+    explicit Replacement(const std::string& target)
+        : target_(target), name_(target + ".XXXXXX"), file_(::mkstemp(name_.data()))
+    {
+    }
+    ~Replacement()
+    {
+        if (!isDone_)
+            ::unlink(name_.c_str());
+    }
+    Replacement(const Replacement&) = delete;
+    Replacement& operator=(const Replacement&) = delete;
+
+    void write(std::string_view content, mode_t mode)
+    {
+        writeAll(file_.number(), content);
+        check(::fchmod(file_.number(), mode));
+        check(::fsync(file_.number()));
+        file_.close();
+        check(::rename(name_.c_str(), target_.c_str()));
+        isDone_ = true;
+    }
+
+private:
+    std::string target_;
+    std::string name_;
+    Descriptor file_;
+    bool isDone_ = false;
+};
+
+mode_t modeOfNewFiles()
+{
+    const mode_t mask = ::umask(0);
+    ::umask(mask);
+    return static_cast<mode_t>(0666 & ~mask);
+}
+
+void writeInPlace(const std::string& path, std::string_view content)
+{
+    Descriptor file(::open(path.c_str(), O_WRONLY | O_CLOEXEC));
+    writeAll(file.number(), content);
+    file.close();
+}
+
+} // namespace
+
+void replaceFile(const std::string& path, std::string_view content)
+{
+    try {
+        const std::string target = std::filesystem::weakly_canonical(path).string();
+        struct stat status {};
+        const bool exists = ::stat(target.c_str(), &status) == 0;
+        if (exists && !S_ISREG(status.st_mode))
+            writeInPlace(target, content);
+        else
+            Replacement(target).write(content, exists ? status.st_mode & 07777 : modeOfNewFiles());
+    } catch (const std::system_error& error) {
+        throw std::runtime_error(path + ": " + error.code().message());
+    }
+}
+
+} // namespace Tools

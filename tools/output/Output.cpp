@@ -1,0 +1,70 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "tools/output/Output.h"
+
+#include "tools/output/Utf8.h"
+
+#include <fcntl.h>
+#include <unistd.h>
+
+#include <cerrno>
+#include <exception>
+#include <stdexcept>
+#include <system_error>
+
+namespace Tools {
+
+namespace {
+
+constexpr std::size_t pieceSize = std::size_t{1} << 16;
+
+} // namespace
+
+void reserveStandardStreams()
+{
+    for (const int stream : {STDIN_FILENO, STDOUT_FILENO, STDERR_FILENO}) {
+        if (::fcntl(stream, F_GETFD) != -1)
+            continue;
+        // The lowest free number is given out, which is this one. Opened the wrong way round.
+        (void)::open("/dev/null", stream == STDIN_FILENO ? O_WRONLY : O_RDONLY);
+    }
+}
+
+void writeAll(int descriptor, std::string_view text)
+{
+    while (!text.empty()) {
+        const ssize_t written = ::write(descriptor, text.data(), text.size());
+        if (written >= 0)
+            text.remove_prefix(static_cast<std::size_t>(written));
+        else if (errno != EINTR)
+            throw std::system_error(errno, std::generic_category());
+    }
+}
+
+void Output::write(std::string_view text)
+{
+    pending_ += text;
+    if (pending_.size() >= pieceSize)
+        flush();
+}
+
+void Output::flush()
+{
+    try {
+        writeAll(descriptor_, pending_);
+    } catch (const std::system_error& error) {
+        throw std::runtime_error("cannot write the output: " + error.code().message());
+    }
+    pending_.clear();
+}
+
+void complain(std::string_view text) noexcept
+{
+    try {
+        writeAll(STDERR_FILENO, "sensorctl: " + printable(text) + "\n");
+    } catch (const std::exception&) {
+        // there is nowhere left to say so
+    }
+}
+
+} // namespace Tools

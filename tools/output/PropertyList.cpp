@@ -1,0 +1,109 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "tools/output/PropertyList.h"
+
+#include "host/broker/Array.h"
+#include "host/broker/Instance.h"
+#include "host/broker/String.h"
+#include "host/broker/Text.h"
+#include "tools/cim/SensorView.h"
+#include "tools/cim/ValueMaps.h"
+#include "tools/output/Emphasis.h"
+#include "tools/output/Utf8.h"
+
+#include <algorithm>
+#include <string_view>
+#include <vector>
+
+namespace Tools {
+
+namespace {
+
+constexpr std::size_t margin = 2;
+
+std::string withUnit(const std::string& number, std::string_view unit)
+{
+    return unit.empty() ? number : number + " " + std::string(unit);
+}
+
+// What a plain number stands for; empty when it stands for itself.
+std::string meaningIn(const SensorView& sensor, std::string_view property, const Host::Value& value)
+{
+    if (property == "CurrentReading") {
+        const auto reading = sensor.reading();
+        return reading ? withUnit(*reading, sensor.unit()) : "no reading";
+    }
+    if (property.find("Threshold") != std::string_view::npos && value.signedInteger()) {
+        const auto limit = sensor.limit(property);
+        return limit ? withUnit(*limit, sensor.unit()) : "out of range";
+    }
+    const auto code = value.unsignedInteger();
+    return code ? std::string(meaningOf(property, *code)) : std::string{};
+}
+
+std::string shown(const SensorView& sensor, std::string_view property, const Host::Value& value)
+{
+    if (const auto text = value.text())
+        return printable(*text);
+    const std::string meaning = meaningIn(sensor, property, value);
+    const std::string number = printable(Host::toText(value));
+    return meaning.empty() ? number : number + " (" + meaning + ")";
+}
+
+// One item, or an item for each element of an array.
+std::vector<std::string> itemsOf(
+    const SensorView& sensor, std::string_view property, const Host::Value& value)
+{
+    const Host::Array* const array = value.array();
+    if (array == nullptr)
+        return {shown(sensor, property, value)};
+    std::vector<std::string> items;
+    for (const Host::Value& element : array->elements())
+        items.push_back(shown(sensor, property, element));
+    return items;
+}
+
+// Items with commas between them, in lines that begin at the column and stay within the width
+// as far as the items themselves do.
+std::string flow(const std::vector<std::string>& items, std::size_t column, std::size_t width)
+{
+    std::string text;
+    std::size_t used = column;
+    for (std::size_t i = 0; i < items.size(); ++i) {
+        const std::string item = items[i] + (i + 1 < items.size() ? "," : "");
+        const std::size_t room = 1 + displayWidth(item);
+        if (i > 0 && used + room > width) {
+            text.append("\n").append(column, ' ');
+            used = column;
+        } else if (i > 0) {
+            text += ' ';
+            ++used;
+        }
+        text += item;
+        used += room - 1;
+    }
+    return text;
+}
+
+} // namespace
+
+std::string propertyList(const Host::Instance& instance, std::size_t width, bool isColored)
+{
+    std::size_t column = 0;
+    for (const Host::NamedValue& property : instance.properties())
+        column = std::max(column, property.name->text()->size());
+    column += 2 * margin;
+
+    const SensorView sensor(instance);
+    std::string text = emphasized(printable(sensor.name()), Emphasis::heading, isColored) + "\n";
+    for (const Host::NamedValue& property : instance.properties()) {
+        if (property.value.isNull())
+            continue;
+        const std::string_view name = *property.name->text();
+        text.append(margin, ' ').append(name).append(column - margin - name.size(), ' ');
+        text += flow(itemsOf(sensor, name, property.value), column, width) + "\n";
+    }
+    return text;
+}
+
+} // namespace Tools
