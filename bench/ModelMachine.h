@@ -1,0 +1,51 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// A machine of any number of sensors, as a model file in a temporary folder.
+
+#pragma once
+
+#include "tests/support/Environment.h"
+#include "tests/support/TemporaryFolder.h"
+
+#include <cstdint>
+#include <string>
+
+namespace Bench {
+
+class ModelMachine {
+public:
+    explicit ModelMachine(std::int64_t sensors)
+        : environment_(
+              "VORN_INSTRUMENTATION", "model:" + folder_.write("model.json", content(sensors)))
+    {
+    }
+
+    // The device identifier of a sensor in the middle.
+    static std::string someDeviceID(std::int64_t sensors)
+    {
+        const std::string number = std::to_string(sensors / 2);
+        return "Sensor " + number + ":/board/" + number;
+    }
+
+private:
+    static std::string content(std::int64_t sensors)
+    {
+        static const char* const types[] = {"temperature", "voltage", "tachometer"};
+        std::string text = "{\"nodes\": [";
+        for (std::int64_t i = 0; i < sensors; ++i) {
+            const std::string number = std::to_string(i);
+            text += (i == 0 ? "" : ",\n");
+            text += "{\"type\": \"" + std::string(types[i % 3]) + "\", \"path\": \"/board/" +
+                    number + "\", \"description\": \"Sensor " + number +
+                    "\", \"status\": 1, \"possibleStates\": [1, 23, 26], \"baseUnits\": 2, "
+                    "\"reading\": 41.5, \"lowerNonCritical\": 5, \"upperNonCritical\": 80, "
+                    "\"lowerCritical\": 1, \"upperCritical\": 95}";
+        }
+        return text + "]}";
+    }
+
+    Testing::TemporaryFolder folder_;
+    Testing::EnvironmentVariable environment_;
+};
+
+} // namespace Bench

@@ -1,0 +1,180 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// What the requests of ZUMLO_NumericSensor cost, and where their time goes.
+
+#include "bench/ModelMachine.h"
+#include "factory/SensorFactory.h"
+#include "host/broker/Broker.h"
+#include "host/broker/CollectedResult.h"
+#include "host/broker/ObjectPath.h"
+#include "host/broker/Request.h"
+#include "host/broker/Result.h"
+#include "include/TracedOperation.h"
+#include "model/SensorHarvest.h"
+#include "platform/logging/Configuration.h"
+#include "tests/providers/Factories.h"
+
+#include <benchmark/benchmark.h>
+
+namespace {
+
+using namespace Vorn::SensorProfileProvider;
+using Bench::ModelMachine;
+
+constexpr const char* NameSpace = "root/cimv2";
+constexpr const char* Class = "ZUMLO_NumericSensor";
+
+void reportPerSensor(benchmark::State& state, std::int64_t sensors)
+{
+    state.counters["per_sensor"] = benchmark::Counter(static_cast<double>(sensors),
+        benchmark::Counter::kIsIterationInvariantRate | benchmark::Counter::kInvert);
+}
+
+// Runs a handler in a request of its own, and the request's end with it.
+template <typename Handler>
+void handle(benchmark::State& state, const Handler& handler)
+{
+    const ModelMachine machine(state.range(0));
+    const Host::Broker broker;
+    CMPIInstanceMI* const mi =
+        SensorProfileProvider_Create_InstanceMI(broker.handle(), nullptr, nullptr);
+    for (auto _ : state) {
+        Host::Request request(broker);
+        Host::CollectedResult answer;
+        Host::Result result(answer);
+        Host::ObjectPath& ref = request.makePath(NameSpace, Class);
+        handler(mi, request, result, ref);
+        benchmark::DoNotOptimize(answer.isDone());
+    }
+}
+
+void EnumInstanceNames(benchmark::State& state)
+{
+    handle(state, [](auto* mi, auto& request, auto& result, auto& ref) {
+        mi->ft->enumerateInstanceNames(
+            mi, request.context().handle(), result.handle(), ref.handle());
+    });
+    reportPerSensor(state, state.range(0));
+}
+
+void EnumInstances(benchmark::State& state)
+{
+    handle(state, [](auto* mi, auto& request, auto& result, auto& ref) {
+        mi->ft->enumerateInstances(
+            mi, request.context().handle(), result.handle(), ref.handle(), nullptr);
+    });
+    reportPerSensor(state, state.range(0));
+}
+
+void GetInstance(benchmark::State& state)
+{
+    const std::string deviceID = ModelMachine::someDeviceID(state.range(0));
+    handle(state, [&](auto* mi, auto& request, auto& result, auto& ref) {
+        ref.addKey("DeviceID", Host::Value::text(request.arena(), deviceID));
+        mi->ft->getInstance(mi, request.context().handle(), result.handle(), ref.handle(), nullptr);
+    });
+    reportPerSensor(state, state.range(0)); // it harvests all of them
+}
+
+// ---- Where the time of EnumInstances goes ----
+
+void Harvest(benchmark::State& state)
+{
+    const ModelMachine machine(state.range(0));
+    for (auto _ : state) {
+        std::vector<Sensor> sensors;
+        getSensorInstances(sensors);
+        benchmark::DoNotOptimize(sensors.data());
+    }
+    reportPerSensor(state, state.range(0));
+}
+
+// Harvest and index: what a factory does before it is asked for anything.
+void Records(benchmark::State& state)
+{
+    const ModelMachine machine(state.range(0));
+    for (auto _ : state) {
+        SensorFactory factory(true, false);
+        benchmark::DoNotOptimize(&factory);
+    }
+    reportPerSensor(state, state.range(0));
+}
+
+void Building(benchmark::State& state)
+{
+    const ModelMachine machine(state.range(0));
+    const Host::Broker broker;
+    SensorFactory factory(true, false);
+    for (auto _ : state) {
+        const Host::Request request(broker);
+        std::vector<CMPIInstance*> instances;
+        CMPIStatus status = {CMPI_RC_OK, nullptr};
+        factory.getAllSensorCMPIInstances(broker.handle(),
+            request.makePath(NameSpace, Class).handle(), nullptr, false, instances, &status);
+        benchmark::DoNotOptimize(instances.data());
+    }
+    reportPerSensor(state, state.range(0));
+}
+
+// ---- One trace point ----
+
+const std::string Component = "Nimbrel.Bench";
+
+void TracePoint(benchmark::State& state, const RynLog::Configuration& configuration)
+{
+    RynLog::configure(configuration);
+    const int object = 0;
+    for (auto _ : state) {
+        const Vorn::TracedOperation traced({Component, "Bench"}, "makeSensorInstance", [&] {
+            return Vorn::parameterList(" broker=", &object, " ref=", &object, " snsr=", &object,
+                " properties=", &object, " isObjPath=", false, " rc=", &object);
+        });
+        traced.entering(269);
+    }
+    RynLog::configure({6000, "off", "off"});
+}
+
+void TracePointOff(benchmark::State& state)
+{
+    TracePoint(state, {6000, "off", "off"});
+}
+
+// With the default settings: messages only, to the system log.
+void TracePointBelowLevel(benchmark::State& state)
+{
+    TracePoint(state, {6000, "syslog", "off"});
+}
+
+void TracePointWritten(benchmark::State& state)
+{
+    TracePoint(state, {3000, "file:/dev/null", "file:/dev/null"});
+}
+
+void sensorCounts(benchmark::internal::Benchmark* benchmark)
+{
+    for (const int sensors : {10, 100, 1000, 10000, 60000})
+        benchmark->Arg(sensors);
+    benchmark->Unit(benchmark::kMicrosecond);
+}
+
+BENCHMARK(EnumInstanceNames)->Apply(sensorCounts);
+BENCHMARK(EnumInstances)->Apply(sensorCounts);
+BENCHMARK(GetInstance)->Apply(sensorCounts);
+BENCHMARK(Harvest)->Apply(sensorCounts);
+BENCHMARK(Records)->Apply(sensorCounts);
+BENCHMARK(Building)->Apply(sensorCounts);
+BENCHMARK(TracePointOff);
+BENCHMARK(TracePointBelowLevel);
+BENCHMARK(TracePointWritten);
+
+} // namespace
+
+int main(int argc, char** argv)
+{
+    RynLog::configure({6000, "off", "off"});
+    benchmark::Initialize(&argc, argv);
+    if (benchmark::ReportUnrecognizedArguments(argc, argv))
+        return 1;
+    benchmark::RunSpecifiedBenchmarks();
+    return 0;
+}
