@@ -1,0 +1,53 @@
+# Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+# shellcheck shell=bash
+
+# The Debian packages that building and checking needs, and their installation. Sourced by
+# `run` and `check`.
+
+build_packages=(
+  g++ cmake ninja-build
+  gettext
+  libboost-locale-dev libcli11-dev libfmt-dev libsensors-dev libspdlog-dev nlohmann-json3-dev
+)
+
+check_packages=(
+  "${build_packages[@]}"
+  clang libclang-rt-14-dev
+  libgmock-dev libgtest-dev
+  binutils lm-sensors util-linux
+)
+
+bench_packages=(
+  "${build_packages[@]}"
+  libbenchmark-dev
+)
+
+# The packages of the list that are not installed, one a line.
+missing_packages() {
+  local package
+  for package in "$@"; do
+    if [ "$(dpkg-query --show --showformat='${db:Status-Status}' "$package" 2>/dev/null)" != installed ]; then
+      echo "$package"
+    fi
+  done
+}
+
+# Installs what is missing of the list, with sudo when not root. All output goes to standard
+# error, so that it never mixes with what the caller prints.
+install_packages() {
+  local missing as_root=()
+  mapfile -t missing < <(missing_packages "$@")
+  [ ${#missing[@]} -eq 0 ] && return 0
+  if [ "$(id -u)" -ne 0 ]; then
+    if ! command -v sudo >/dev/null; then
+      echo "These packages are missing, and neither root nor sudo is here to install them:" >&2
+      echo "  ${missing[*]}" >&2
+      return 1
+    fi
+    as_root=(sudo)
+  fi
+  echo "Installing ${missing[*]}" >&2
+  "${as_root[@]}" apt-get update --quiet=2 >&2 &&
+    "${as_root[@]}" env DEBIAN_FRONTEND=noninteractive \
+      apt-get install --yes --quiet=2 --no-install-recommends "${missing[@]}" >&2
+}
