@@ -9,19 +9,29 @@ function(sensor_profile_room name)
   target_link_libraries(${name} PUBLIC ${room_USES} PRIVATE ${room_PRIVATELY})
 endfunction()
 
-# sensor_profile_test(NAME SOURCES ... USES libraries ... [ENVIRONMENT variables ...] [DATA])
-# One GoogleTest executable, registered with CTest.
+# sensor_profile_test(NAME SOURCES ... USES libraries ... [ENVIRONMENT variables ...])
+# One GoogleTest executable, registered with CTest. The test framework's headers, the dearest of
+# each test file, are compiled once and shared.
 function(sensor_profile_test name)
   cmake_parse_arguments(test "" "" "SOURCES;USES;ENVIRONMENT" ${ARGN})
-  add_executable(${name} ${test_SOURCES})
-  target_include_directories(${name} PRIVATE "${PROJECT_SOURCE_DIR}")
-  target_link_libraries(${name} PRIVATE ${test_USES} GTest::gmock GTest::gtest_main)
-  target_compile_definitions(${name} PRIVATE
-    SENSOR_PROFILE_SOURCE_DIR="${PROJECT_SOURCE_DIR}"
-    SENSOR_PROFILE_BINARY_DIR="${PROJECT_BINARY_DIR}")
+  sensor_profile_test_executable(${name} ${test_SOURCES})
+  target_precompile_headers(${name} REUSE_FROM test_headers)
+  target_link_libraries(${name} PRIVATE ${test_USES})
   add_test(NAME ${name} COMMAND ${name})
   # The settings of the person who runs the tests must not reach them.
   set_tests_properties(${name} PROPERTIES
     ENVIRONMENT "RYNLOG_LOG=off;RYNLOG_TRACE=off;LC_ALL=C.UTF-8;${test_ENVIRONMENT}"
     TIMEOUT 300)
+endfunction()
+
+# What every test executable is compiled with, and so the precompiled headers too.
+function(sensor_profile_test_executable name)
+  add_executable(${name} ${ARGN})
+  target_include_directories(${name} PRIVATE "${PROJECT_SOURCE_DIR}")
+  target_link_libraries(${name} PRIVATE GTest::gmock GTest::gtest_main)
+  # What is measured and hardened is the rooms' code; optimising the tests only costs time.
+  target_compile_options(${name} PRIVATE $<$<CONFIG:Release>:-O1>)
+  target_compile_definitions(${name} PRIVATE
+    SENSOR_PROFILE_SOURCE_DIR="${PROJECT_SOURCE_DIR}"
+    SENSOR_PROFILE_BINARY_DIR="${PROJECT_BINARY_DIR}")
 endfunction()

@@ -14,7 +14,7 @@ check_packages=(
   "${build_packages[@]}"
   clang libclang-rt-14-dev
   libgmock-dev libgtest-dev
-  binutils lm-sensors util-linux
+  binutils lm-sensors locales util-linux
 )
 
 bench_packages=(

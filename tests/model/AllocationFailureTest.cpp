@@ -1,41 +1,12 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Running out of memory while the capabilities record is appended. The global allocation
-// functions are replaced for this executable alone.
+// Running out of memory while the capabilities record is appended.
 
 #include "model/SensorHarvest.h"
+#include "tests/model/FailingAllocation.h"
 #include "tests/support/LogCapture.h"
 
 #include <gtest/gtest.h>
-
-#include <cstdlib>
-#include <new>
-
-namespace {
-
-// Allocations of exactly this size fail; 0 for none.
-thread_local std::size_t failingSize = 0;
-
-} // namespace
-
-void* operator new(std::size_t size)
-{
-    if (failingSize != 0 && size == failingSize)
-        throw std::bad_alloc();
-    if (void* const memory = std::malloc(size))
-        return memory;
-    throw std::bad_alloc();
-}
-
-void operator delete(void* memory) noexcept
-{
-    std::free(memory);
-}
-
-void operator delete(void* memory, std::size_t) noexcept
-{
-    std::free(memory);
-}
 
 namespace {
 
@@ -54,9 +25,11 @@ TEST(CapabilitiesHarvest, reportsTheFailuresOwnTextWhenTheRecordCannotBeAppended
     auto capabilities = fullVector();
     const Testing::LogCapture capture;
     ::testing::internal::CaptureStderr();
-    failingSize = 2 * capabilities.size() * sizeof(SensorEnabledLogCap);
-    const bool failed = getSensorEnabledLogCapInstances(capabilities);
-    failingSize = 0;
+    bool failed = false;
+    {
+        const Testing::FailingAllocation failing(2 * capabilities.size() * sizeof(SensorEnabledLogCap));
+        failed = getSensorEnabledLogCapInstances(capabilities);
+    }
     EXPECT_EQ(::testing::internal::GetCapturedStderr(), "std::bad_alloc\n");
     EXPECT_TRUE(failed);
     EXPECT_EQ(capabilities.size(), 37U);

@@ -7,6 +7,7 @@
 #include <cstdio>
 #include <cstdlib>
 #include <fstream>
+#include <iterator>
 #include <stdexcept>
 #include <system_error>
 #include <vector>
@@ -76,13 +77,38 @@ void writeFile(const fs::path& path, const std::string& text)
         throw std::runtime_error("cannot write " + path.string());
 }
 
+std::string contentOf(const fs::path& path)
+{
+    std::ifstream file(path);
+    return {std::istreambuf_iterator<char>(file), {}};
+}
+
+// A kept tree has no symbolic links, which not every checkout and archive preserves: the files
+// that the kernel shows as links hold the name of their target.
+void makeLinks(const fs::path& folder)
+{
+    std::vector<fs::path> links;
+    for (const fs::directory_entry& entry : fs::recursive_directory_iterator(folder)) {
+        const fs::path name = entry.path().filename();
+        if (entry.is_regular_file() && (name == "device" || name == "subsystem"))
+            links.push_back(entry.path());
+    }
+    for (const fs::path& link : links) {
+        const std::string target = contentOf(link);
+        fs::remove(link);
+        fs::create_symlink(target, link);
+    }
+}
+
 // The copy must stand before it is bound, since members are built in order.
 const fs::path& filled(const fs::path& folder, const fs::path& tree)
 {
-    if (tree.empty())
+    if (tree.empty()) {
         fs::create_directories(folder / "hwmon");
-    else
-        fs::copy(tree, folder, fs::copy_options::recursive | fs::copy_options::copy_symlinks);
+    } else {
+        fs::copy(tree, folder, fs::copy_options::recursive);
+        makeLinks(folder);
+    }
     return folder;
 }
 
