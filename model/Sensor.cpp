@@ -46,8 +46,9 @@ std::string Sensor::getElementName() const
 
 std::vector<std::string> Sensor::getPossibleStates()
 {
-    possibleStates_.insert(possibleStates_.end(), FixedStateLabels.begin(), FixedStateLabels.end());
-    return possibleStates_;
+    for (const char* const label : FixedStateLabels)
+        possibleStates_.append(label);
+    return possibleStates_.as<std::string>();
 }
 
 std::uint16_t Sensor::getRateUnits()
@@ -135,7 +136,7 @@ bool Sensor::setCurrentState(unsigned nodeStatus)
 
 bool Sensor::setOperationalStatus(unsigned nodeStatus)
 {
-    operationalStatus_.push_back(OperationalStatuses[nodeStatus]);
+    operationalStatus_.append(OperationalStatuses[nodeStatus]);
     return true;
 }
 
@@ -143,7 +144,7 @@ bool Sensor::setPossibleStates(std::vector<unsigned> nodeStatuses)
 {
     possibleStates_.clear();
     for (const unsigned status : nodeStatuses)
-        possibleStates_.emplace_back(StateLabels[status]);
+        possibleStates_.append(StateLabels[status]);
     return true;
 }
 

@@ -2,6 +2,8 @@
 
 #pragma once
 
+#include "model/ShortList.h"
+
 #include <cstdint>
 #include <string>
 #include <vector>
@@ -27,7 +29,7 @@ public:
     std::string getDeviceID() const;    // without leading and trailing blanks
     std::string getElementName() const; // without leading and trailing blanks
     std::string getCurrentState() const { return currentState_; }
-    std::string getHealthStatus() const { return healthStatus_; } // the property Status
+    std::string getHealthStatus() const { return healthStatus_; } // property Status
     std::vector<std::string> getPossibleStates();                 // appends the twelve fixed labels
     std::uint16_t getBaseUnits() const { return baseUnits_; }
     std::uint16_t getRateUnits(); // always 0, which it also stores
@@ -43,7 +45,10 @@ public:
     std::int32_t getUpperThresholdCritical() const { return upperThresholdCritical_; }
     std::int32_t getLowerThresholdFatal() const { return lowerThresholdFatal_; }
     std::int32_t getUpperThresholdFatal() const { return upperThresholdFatal_; }
-    std::vector<std::uint16_t> getOperationalStatus() const { return operationalStatus_; }
+    std::vector<std::uint16_t> getOperationalStatus() const
+    {
+        return operationalStatus_.as<std::uint16_t>();
+    }
     std::vector<std::uint16_t> getSupportedThresholds(); // appends 0 to 5
     std::vector<std::uint16_t> getSettableThresholds();  // appends 0 to 5
 
@@ -73,10 +78,12 @@ private:
     // In base units times the multiplier, truncated toward zero.
     bool storeScaled(std::int32_t& field, double value) const;
 
+    // Labels are those of the value tables, which live as long as the process: a machine has
+    // many sensors and few labels.
     std::string deviceID_;
-    std::string currentState_;
+    const char* currentState_ = "";
     std::string elementName_;
-    std::vector<std::string> possibleStates_;
+    ShortList<const char*, 3> possibleStates_;
     std::uint16_t baseUnits_ = 0;
     std::uint16_t rateUnits_ = 0;
     std::vector<std::uint16_t> supportedThresholds_;
@@ -85,7 +92,7 @@ private:
     std::uint16_t enabledState_ = 0;
     std::uint16_t requestedState_ = 0;
     std::uint16_t healthState_ = 0;
-    std::string healthStatus_;
+    const char* healthStatus_ = "";
     std::int32_t currentReading_ = 0;
     std::int32_t unitModifier_ = 0;
     std::int32_t lowerThresholdNonCritical_ = 0;
@@ -95,7 +102,7 @@ private:
     std::int32_t lowerThresholdFatal_ = 0;
     std::int32_t upperThresholdFatal_ = 0;
     double readingMultiplier_ = 1.0;
-    std::vector<std::uint16_t> operationalStatus_;
+    ShortList<std::uint16_t, 1> operationalStatus_;
 };
 
 } // namespace Vorn::SensorProfileProvider

@@ -10,6 +10,7 @@
 #include <exception>
 #include <iostream>
 #include <string>
+#include <utility>
 
 namespace Vorn::SensorProfileProvider {
 
@@ -147,7 +148,7 @@ bool setVector(std::vector<Sensor>& vectSensor, Vorn::Instrumentation& instrumen
         setStatus(sensor, instrumentation.getNodeStatus());
         require(sensor.setRequestedState(RequestedEnabled), "Failed while setting Requested State");
         setProperties(sensor, instrumentation, possibleStates);
-        vectSensor.push_back(sensor);
+        vectSensor.push_back(std::move(sensor));
         ++instrumentation;
     }
     traced.exiting(920);

@@ -20,7 +20,7 @@ thread_local Arena* currentArena = nullptr;
 } // namespace
 
 Arena::Arena(Purpose purpose)
-    : purpose_(purpose), memory_(purpose == Purpose::clone ? cloneBlock : requestBlock),
+    : purpose_(purpose), memory_(purpose == Purpose::clone ? cloneBlock : requestBlock, &blocks_),
       names_(&memory_)
 {
 }

@@ -5,6 +5,8 @@
 
 #pragma once
 
+#include "host/broker/LargeBlocks.h"
+
 #include <cstddef>
 #include <memory>
 #include <memory_resource>
@@ -74,6 +76,7 @@ public:
 
 private:
     Purpose purpose_;
+    LargeBlocks blocks_;
     std::pmr::monotonic_buffer_resource memory_;
     std::pmr::unordered_map<std::string_view, const String*> names_;
     std::vector<std::shared_ptr<Arena>> adopted_;
