@@ -1,0 +1,125 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "companion/ComputerSystemObjects.h"
+
+#include <cmpimacs.h>
+
+#include <cstdint>
+
+namespace Vorn::Companion {
+
+namespace {
+
+constexpr const char* CreationClassNameKey = "CreationClassName";
+constexpr const char* NameKey = "Name";
+
+// Codes of the DMTF value maps.
+constexpr std::uint16_t Enabled = 2;        // CIM_EnabledLogicalElement.EnabledState
+constexpr std::uint16_t NotApplicable = 12; // .RequestedState: nobody can request one here
+constexpr std::uint16_t Healthy = 5;        // CIM_ManagedSystemElement.HealthState
+constexpr std::uint16_t Ok = 2;             // .OperationalStatus
+constexpr std::uint16_t NotDedicated = 0;   // CIM_ComputerSystem.Dedicated
+
+// The kernel's host name is none of the kinds of names that the value map of NameFormat lists.
+constexpr const char* HostNameFormat = "Other";
+
+const char* nameSpaceOf(const CMPIObjectPath* ref)
+{
+    const CMPIString* const nameSpace = isUsable(ref) ? CMGetNameSpace(ref, nullptr) : nullptr;
+    // The slot itself: header sets differ in the convenience function's arguments.
+    return isUsable(nameSpace) ? nameSpace->ft->getCharPtr(nameSpace, nullptr) : nullptr;
+}
+
+bool setText(const CMPIInstance* instance, const char* name, const char* text)
+{
+    return CMSetProperty(instance, name, text, CMPI_chars).rc == CMPI_RC_OK;
+}
+
+void setCode(const CMPIInstance* instance, const char* name, std::uint16_t code)
+{
+    CMSetProperty(instance, name, &code, CMPI_uint16);
+}
+
+// An array of one element; the property is left out when there is no array with that element.
+void setList(const CMPIBroker* broker, const CMPIInstance* instance, const char* name,
+    const void* element, CMPIType type)
+{
+    CMPIArray* const array = CMNewArray(broker, 1, type, nullptr);
+    if (!isUsable(array))
+        return;
+    if (CMSetArrayElementAt(array, 0, element, type).rc == CMPI_RC_OK)
+        CMSetProperty(instance, name, &array, static_cast<CMPIType>(type | CMPI_ARRAY));
+}
+
+void setCodes(
+    const CMPIBroker* broker, const CMPIInstance* instance, const char* name, std::uint16_t code)
+{
+    setList(broker, instance, name, &code, CMPI_uint16);
+}
+
+void setTexts(
+    const CMPIBroker* broker, const CMPIInstance* instance, const char* name, const char* text)
+{
+    CMPIString* const string = CMNewString(broker, text, nullptr);
+    if (isUsable(string))
+        setList(broker, instance, name, &string, CMPI_string);
+}
+
+void setIdentity(
+    const CMPIBroker* broker, const CMPIInstance* instance, const ComputerSystem& system)
+{
+    setText(instance, "NameFormat", HostNameFormat);
+    setText(instance, "ElementName", system.name.c_str());
+    setText(instance, "Caption", "Computer System");
+    setText(instance, "Description", "The computer that the sensors of this system belong to.");
+    if (!system.machineId)
+        return;
+    setTexts(broker, instance, "OtherIdentifyingInfo", system.machineId->c_str());
+    setTexts(
+        broker, instance, "IdentifyingDescriptions", "Hash of the operating system's machine ID");
+}
+
+void setState(const CMPIBroker* broker, const CMPIInstance* instance)
+{
+    setCodes(broker, instance, "Dedicated", NotDedicated);
+    setCode(instance, "EnabledState", Enabled);
+    setCode(instance, "RequestedState", NotApplicable);
+    setCode(instance, "HealthState", Healthy);
+    setCodes(broker, instance, "OperationalStatus", Ok);
+}
+
+} // namespace
+
+CMPIObjectPath* makePath(
+    const CMPIBroker* broker, const CMPIObjectPath* ref, const ComputerSystem& system)
+{
+    const char* const nameSpace = nameSpaceOf(ref);
+    if (nameSpace == nullptr)
+        return nullptr;
+    CMPIObjectPath* const path = CMNewObjectPath(broker, nameSpace, ComputerSystemClass, nullptr);
+    if (!isUsable(path))
+        return nullptr;
+    CMSetHostname(path, system.name.c_str());
+    const bool isWhole =
+        CMAddKey(path, CreationClassNameKey, ComputerSystemClass, CMPI_chars).rc == CMPI_RC_OK &&
+        CMAddKey(path, NameKey, system.name.c_str(), CMPI_chars).rc == CMPI_RC_OK;
+    return isWhole ? path : nullptr;
+}
+
+CMPIInstance* makeInstance(const CMPIBroker* broker, const CMPIObjectPath* path,
+    const ComputerSystem& system, const char** properties)
+{
+    CMPIInstance* const instance = CMNewInstance(broker, path, nullptr);
+    if (!isUsable(instance))
+        return nullptr;
+    const char* keys[] = {CreationClassNameKey, NameKey, nullptr};
+    CMSetPropertyFilter(instance, properties, keys);
+    if (!setText(instance, CreationClassNameKey, ComputerSystemClass) ||
+        !setText(instance, NameKey, system.name.c_str()))
+        return nullptr;
+    setIdentity(broker, instance, system);
+    setState(broker, instance);
+    return instance;
+}
+
+} // namespace Vorn::Companion

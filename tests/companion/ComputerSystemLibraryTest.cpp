@@ -1,0 +1,55 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// The library as a file: what it exports, and that it leaves memory without a trace.
+
+#include "host/broker/Broker.h"
+#include "host/broker/CollectedResult.h"
+#include "host/broker/ObjectPath.h"
+#include "host/broker/Request.h"
+#include "host/broker/Result.h"
+#include "host/manager/ProviderLibrary.h"
+#include "tests/support/ExportedNames.h"
+
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+#include <dlfcn.h>
+
+namespace {
+
+const std::string library = SENSOR_PROFILE_BINARY_DIR "/lib/libComputerSystemProvider.so";
+
+bool isLoaded()
+{
+    void* const handle = ::dlopen(library.c_str(), RTLD_NOW | RTLD_NOLOAD);
+    if (handle != nullptr)
+        ::dlclose(handle);
+    return handle != nullptr;
+}
+
+TEST(ComputerSystemLibrary, exportsItsFactoryAndNothingElse)
+{
+    EXPECT_THAT(Testing::exportedNames(library),
+        testing::ElementsAre("ComputerSystemProvider_Create_InstanceMI"));
+}
+
+TEST(ComputerSystemLibrary, isUsedAndUnloadedOverAndOver)
+{
+    for (int use = 0; use < 20; ++use) {
+        Host::Broker broker;
+        Host::ProviderLibrary loaded(broker, library);
+        Host::Request request(broker);
+        CMPIInstanceMI& mi = loaded.instanceMI("ComputerSystemProvider");
+        Host::CollectedResult answer;
+        Host::Result result(answer);
+        const CMPIStatus status =
+            mi.ft->enumerateInstances(&mi, request.context().handle(), result.handle(),
+                request.makePath("root/cimv2", "ZUMLO_ComputerSystem").handle(), nullptr);
+        EXPECT_EQ(status.rc, CMPI_RC_OK);
+        EXPECT_EQ(answer.instances().size(), 1U);
+        EXPECT_TRUE(isLoaded());
+    }
+    EXPECT_FALSE(isLoaded());
+}
+
+} // namespace

@@ -1,0 +1,76 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "companion/ComputerSystemObjects.h"
+
+#include "tests/support/ProviderTest.h"
+
+#include <gmock/gmock.h>
+
+namespace {
+
+using Testing::describe;
+using ::testing::ElementsAre;
+using Vorn::Companion::ComputerSystem;
+
+constexpr const char* Class = Vorn::Companion::ComputerSystemClass;
+
+class ComputerSystemObjectsTest : public Testing::ProviderTest {
+protected:
+    const Host::Instance& instance(const ComputerSystem& system, const char** properties = nullptr)
+    {
+        const CMPIObjectPath* const at =
+            Vorn::Companion::makePath(broker(), path(Class).handle(), system);
+        return *Host::Instance::of(Vorn::Companion::makeInstance(broker(), at, system, properties));
+    }
+};
+
+TEST_F(ComputerSystemObjectsTest, anInstanceHasEveryProperty)
+{
+    EXPECT_THAT(describe(instance({"box", "some-hash"}).properties()),
+        ElementsAre("CreationClassName = string \"ZUMLO_ComputerSystem\"", "Name = string \"box\"",
+            "NameFormat = string \"Other\"", "ElementName = string \"box\"",
+            "Caption = string \"Computer System\"",
+            "Description = string \"The computer that the sensors of this system belong to.\"",
+            "OtherIdentifyingInfo = [string \"some-hash\"]",
+            "IdentifyingDescriptions = [string \"Hash of the operating system's machine ID\"]",
+            "Dedicated = [uint16 0]", "EnabledState = uint16 2", "RequestedState = uint16 12",
+            "HealthState = uint16 5", "OperationalStatus = [uint16 2]"));
+}
+
+TEST_F(ComputerSystemObjectsTest, aMachineWithoutIdentifierHasNoIdentifyingInfo)
+{
+    const Host::Instance& made = instance({"box", std::nullopt});
+    EXPECT_EQ(made.property("OtherIdentifyingInfo"), nullptr);
+    EXPECT_EQ(made.property("IdentifyingDescriptions"), nullptr);
+    EXPECT_EQ(made.properties().size(), 11U);
+}
+
+TEST_F(ComputerSystemObjectsTest, aPropertyListLeavesTheKeysAndWhatItNames)
+{
+    const char* properties[] = {"healthstate", "Unheard", nullptr};
+    EXPECT_THAT(Testing::namesOf(instance({"box", "id"}, properties).properties()),
+        ElementsAre("CreationClassName", "Name", "HealthState"));
+}
+
+TEST_F(ComputerSystemObjectsTest, anEmptyPropertyListLeavesTheKeys)
+{
+    const char* properties[] = {nullptr};
+    EXPECT_THAT(Testing::namesOf(instance({"box", "id"}, properties).properties()),
+        ElementsAre("CreationClassName", "Name"));
+}
+
+TEST_F(ComputerSystemObjectsTest, thePathHasTheRequestsNamespaceAndTheComputerAsHost)
+{
+    const CMPIObjectPath* const made = Vorn::Companion::makePath(
+        broker(), path(Class, {}, "root/other").handle(), {"box", std::nullopt});
+    EXPECT_EQ(Host::ObjectPath::of(made)->toText(),
+        "//box/root/other:ZUMLO_ComputerSystem.CreationClassName=\"ZUMLO_ComputerSystem\","
+        "Name=\"box\"");
+}
+
+TEST_F(ComputerSystemObjectsTest, theComputerHasTheSystemNameOfItsSensors)
+{
+    EXPECT_EQ(Vorn::Companion::thisComputerSystem().name, systemName_);
+}
+
+} // namespace

@@ -1,0 +1,11 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// The library's entry point, as an object manager finds it.
+
+#pragma once
+
+#include <cmpidt.h>
+#include <cmpift.h>
+
+extern "C" CMPIInstanceMI* ComputerSystemProvider_Create_InstanceMI(
+    const CMPIBroker*, const CMPIContext*, CMPIStatus*);
