@@ -6,6 +6,8 @@
 
 #include <cmpimacs.h>
 
+#include <cstring>
+
 namespace Vorn::SensorProfileProvider {
 
 const char* charactersOf(const CMPIString* string, CMPIStatus* rc)
@@ -19,16 +21,16 @@ const char* nameSpaceOf(const CMPIObjectPath* path, CMPIStatus* rc)
     return isUsable(path) ? charactersOf(CMGetNameSpace(path, rc), rc) : nullptr;
 }
 
-const char* classNameOf(const CMPIObjectPath* path, CMPIStatus* rc)
+CMPIString* classNameOf(const CMPIObjectPath* path, CMPIStatus* rc)
 {
-    return isUsable(path) ? charactersOf(CMGetClassName(path, rc), rc) : nullptr;
+    return isUsable(path) ? CMGetClassName(path, rc) : nullptr;
 }
 
 CMPIObjectPath* newPath(
     const CMPIBroker* broker, const CMPIObjectPath* ref, const char* className, CMPIStatus* rc)
 {
     const char* const nameSpace = nameSpaceOf(ref, rc);
-    if (nameSpace == nullptr)
+    if (nameSpace == nullptr || broker == nullptr)
         return nullptr;
     CMPIObjectPath* const path = CMNewObjectPath(broker, nameSpace, className, rc);
     if (!isUsable(path))
@@ -42,6 +44,12 @@ void copyNameSpace(const CMPIObjectPath* path, const CMPIObjectPath* ref, CMPISt
 {
     if (const char* const nameSpace = nameSpaceOf(ref, rc))
         CMSetNameSpace(path, nameSpace);
+}
+
+bool isOfClass(const CMPIObjectPath* path, const char* className, CMPIStatus* rc)
+{
+    const char* const characters = charactersOf(classNameOf(path, rc), rc);
+    return characters != nullptr && std::strcmp(characters, className) == 0;
 }
 
 void addTextKey(const CMPIObjectPath* path, const char* name, const char* text)

@@ -22,7 +22,11 @@ const char* charactersOf(const CMPIString* string, CMPIStatus* rc);
 
 // Null when the path does not say.
 const char* nameSpaceOf(const CMPIObjectPath* path, CMPIStatus* rc);
-const char* classNameOf(const CMPIObjectPath* path, CMPIStatus* rc);
+// Null when there is no path.
+CMPIString* classNameOf(const CMPIObjectPath* path, CMPIStatus* rc);
+
+// Whether the path is of exactly that class, letter for letter.
+bool isOfClass(const CMPIObjectPath* path, const char* className, CMPIStatus* rc);
 
 // A path without keys: the namespace of `ref`, the class, and this system as host. Null when
 // it cannot be made. `rc` goes to the broker and may be null.

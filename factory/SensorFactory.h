@@ -61,6 +61,38 @@ public:
     int getAllSensorCMPIObjPaths(const CMPIBroker* broker, const CMPIObjectPath* ref,
         std::vector<CMPIObjectPath*>& objectPaths, CMPIStatus* status);
 
+    // One instance of ZUMLO_SensorEnabledLogicalElementCapabilities, or null (or a handle-less
+    // instance) when the broker made none. An array the broker cannot make is left out; the
+    // failure stands in rc, which must be looked at as well and may be null. `isObjPath` as
+    // above.
+    CMPIInstance* makeSensorEnabledLogicalElementCapInstance(const CMPIBroker* broker,
+        const CMPIObjectPath* ref, SensorEnabledLogCap snsrCap, const char** properties,
+        bool isObjPath, CMPIStatus* rc);
+
+    // The same three operations for the capabilities, ordered by instance identifier.
+    int getAllSensorEnabledLogicalElementCapCMPIInstances(const CMPIBroker* broker,
+        const CMPIObjectPath* ref, const char** properties, bool isObjPath,
+        std::vector<CMPIInstance*>& instances, CMPIStatus* rc);
+    int getOneSensorEnabledLogicalElementCapCMPIInstance(const CMPIBroker* broker,
+        const CMPIObjectPath* ref, CMPIString* key, const char** properties,
+        std::vector<CMPIInstance*>& instances, CMPIStatus* rc);
+    int getAllSensorEnabledLogicalElementCapCMPIObjPaths(const CMPIBroker* broker,
+        const CMPIObjectPath* ref, std::vector<CMPIObjectPath*>& objectPaths, CMPIStatus* status);
+
+    // The class at the far end of the association `_RefLeftClass` from an object of the path's
+    // class: one of the constants of ClassNames.h, or null when the path's class is no end of
+    // that association. Names are compared letter for letter. `_RefRightClass` is only traced;
+    // both may be null. rc goes to the broker and is not written otherwise.
+    static const char* get_assoc_targetClass_Name(const CMPIBroker* broker,
+        const CMPIObjectPath* ref, const char* _RefLeftClass, const char* _RefRightClass,
+        CMPIStatus* rc);
+
+    // A path without keys of that class, in the namespace of the request and on this system.
+    // Null when there is no such class or the broker made no path.
+    static CMPIObjectPath* get_assoc_targetClass_ObjectPath(const CMPIBroker* broker,
+        const CMPIObjectPath* ref, const char* _RefLeftClass, const char* _RefRightClass,
+        CMPIStatus* rc);
+
 private:
     void _createSensorMap();
     void _createEnabledLogicalElementCapMap();

@@ -1,8 +1,7 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
 // The handlers that do the same for every provider: nothing is changed or queried through this
-// library, and there is nothing to clean up. They write no trace line and touch no result. So
-// do the reading handlers of the classes that are not served yet.
+// library, and there is nothing to clean up. They write no trace line and touch no result.
 
 #pragma once
 
@@ -36,42 +35,6 @@ inline CMPIStatus deleteNotSupported(
 
 inline CMPIStatus queryNotSupported(CMPIInstanceMI*, const CMPIContext*, const CMPIResult*,
     const CMPIObjectPath*, const char*, const char*)
-{
-    return notSupported();
-}
-
-inline CMPIStatus enumerateNamesNotSupported(
-    CMPIInstanceMI*, const CMPIContext*, const CMPIResult*, const CMPIObjectPath*)
-{
-    return notSupported();
-}
-
-inline CMPIStatus readNotSupported(
-    CMPIInstanceMI*, const CMPIContext*, const CMPIResult*, const CMPIObjectPath*, const char**)
-{
-    return notSupported();
-}
-
-inline CMPIStatus associatorsNotSupported(CMPIAssociationMI*, const CMPIContext*, const CMPIResult*,
-    const CMPIObjectPath*, const char*, const char*, const char*, const char*, const char**)
-{
-    return notSupported();
-}
-
-inline CMPIStatus associatorNamesNotSupported(CMPIAssociationMI*, const CMPIContext*,
-    const CMPIResult*, const CMPIObjectPath*, const char*, const char*, const char*, const char*)
-{
-    return notSupported();
-}
-
-inline CMPIStatus referencesNotSupported(CMPIAssociationMI*, const CMPIContext*, const CMPIResult*,
-    const CMPIObjectPath*, const char*, const char*, const char**)
-{
-    return notSupported();
-}
-
-inline CMPIStatus referenceNamesNotSupported(CMPIAssociationMI*, const CMPIContext*,
-    const CMPIResult*, const CMPIObjectPath*, const char*, const char*)
 {
     return notSupported();
 }

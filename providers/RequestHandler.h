@@ -22,7 +22,8 @@ public:
     {
     }
 
-    void entry(unsigned line) const
+    // A line that is not given is the caller's.
+    void entry(unsigned line = __builtin_LINE()) const
     {
         markProviderEntry(module_.component, function_, module_.file, line);
     }
@@ -31,8 +32,9 @@ public:
     {
         traceMessage(module_, function_, line, text);
     }
+    void failure(const char* text, unsigned line = __builtin_LINE()) const { failure(line, text); }
 
-    void exit(unsigned line) const
+    void exit(unsigned line = __builtin_LINE()) const
     {
         markProviderExit(module_.component, function_, module_.file, line);
     }

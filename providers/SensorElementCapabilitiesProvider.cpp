@@ -1,8 +1,9 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The instance and association provider of ZUMLO_SensorElementCapabilities.
+// The function tables and factories of the provider of ZUMLO_SensorElementCapabilities.
 
 #include "providers/NotSupported.h"
+#include "providers/SensorElementCapabilities.h"
 
 #include <string>
 
@@ -10,16 +11,20 @@ namespace Vorn::SensorProfileProvider {
 
 namespace {
 
-// Set by the factories; the handlers that will use it are not served yet.
-[[maybe_unused]] const CMPIBroker* broker = nullptr;
+const std::string loggerSensorElementCapabilities = "Nimbrel.SensorElementCapabilities";
 
-[[maybe_unused]] const std::string loggerSensorElementCapabilities =
-    "Nimbrel.SensorElementCapabilities";
+} // namespace
+
+const CMPIBroker* ElementCapabilities::broker = nullptr;
+
+TraceModule ElementCapabilities::module()
+{
+    return {loggerSensorElementCapabilities, "SensorElementCapabilitiesProvider"};
+}
+
+namespace {
 
 constexpr auto SensorElementCapabilities_Cleanup = cleanUpNothing;
-constexpr auto SensorElementCapabilities_EnumInstanceNames = enumerateNamesNotSupported;
-constexpr auto SensorElementCapabilities_EnumInstances = readNotSupported;
-constexpr auto SensorElementCapabilities_GetInstance = readNotSupported;
 constexpr auto SensorElementCapabilities_CreateInstance = createNotSupported;
 constexpr auto SensorElementCapabilities_ModifyInstance = modifyNotSupported;
 constexpr auto SensorElementCapabilities_DeleteInstance = deleteNotSupported;
@@ -32,10 +37,6 @@ const CMPIInstanceMIFT instMIFT__ = {200, 200, "instanceSensorElementCapabilitie
     SensorElementCapabilities_DeleteInstance, SensorElementCapabilities_ExecQuery};
 
 constexpr auto SensorElementCapabilities_AssociationCleanup = cleanUpNoAssociation;
-constexpr auto SensorElementCapabilities_Associators = associatorsNotSupported;
-constexpr auto SensorElementCapabilities_AssociatorNames = associatorNamesNotSupported;
-constexpr auto SensorElementCapabilities_References = referencesNotSupported;
-constexpr auto SensorElementCapabilities_ReferenceNames = referenceNamesNotSupported;
 
 const CMPIAssociationMIFT assocMIFT__ = {200, 200, "associationSensorElementCapabilitiesProvider",
     SensorElementCapabilities_AssociationCleanup, SensorElementCapabilities_Associators,
@@ -49,7 +50,7 @@ SensorElementCapabilitiesProvider_Create_InstanceMI(
     const CMPIBroker* theBroker, const CMPIContext*, CMPIStatus*)
 {
     static CMPIInstanceMI mi = {nullptr, &instMIFT__};
-    broker = theBroker;
+    ElementCapabilities::broker = theBroker;
     return &mi;
 }
 
@@ -58,7 +59,7 @@ SensorElementCapabilitiesProvider_Create_AssociationMI(
     const CMPIBroker* theBroker, const CMPIContext*, CMPIStatus*)
 {
     static CMPIAssociationMI mi = {nullptr, &assocMIFT__};
-    broker = theBroker;
+    ElementCapabilities::broker = theBroker;
     return &mi;
 }
 

@@ -2,6 +2,8 @@
 
 // The instance provider of ZUMLO_SensorEnabledLogicalElementCapabilities.
 
+#include "factory/ClassNames.h"
+#include "providers/InstanceRequests.h"
 #include "providers/NotSupported.h"
 
 #include <string>
@@ -10,17 +12,58 @@ namespace Vorn::SensorProfileProvider {
 
 namespace {
 
-// Set by the factories; the handlers that will use it are not served yet.
-[[maybe_unused]] const CMPIBroker* broker = nullptr;
+const CMPIBroker* broker = nullptr;
 
-[[maybe_unused]] const std::string loggerSensorEnabledLogicalElementCapabilitiesProvider =
+const std::string loggerSensorEnabledLogicalElementCapabilitiesProvider =
     "Nimbrel.SensorEnabledLogicalElementCapabilitiesProvider";
 
+RecordClass capabilities()
+{
+    return {
+        .module = {loggerSensorEnabledLogicalElementCapabilitiesProvider,
+            "SensorEnabledLogicalElementCapabilitiesProvider"},
+        .provider = SensorEnabledLogicalElementCapabilitiesProvider,
+        .key = "InstanceID",
+        .isCap = true,
+        .reservesForEachSensor = false,
+        .paths = &SensorFactory::getAllSensorEnabledLogicalElementCapCMPIObjPaths,
+        .instances = &SensorFactory::getAllSensorEnabledLogicalElementCapCMPIInstances,
+        .one = &SensorFactory::getOneSensorEnabledLogicalElementCapCMPIInstance,
+        .pathsFailed = "getAllSensorEnabledLogicalElementCapCMPIObjPaths failed",
+        .instancesFailed = "getAllSensorEnabledLogicalElementCapCMPIInstances failed",
+        .oneFailed = "getOneSensorEnabledLogicalElementCapCMPIInstance failed",
+    };
+}
+
+} // namespace
+
+CMPIStatus SensorEnabledLogicalElementCapabilities_EnumInstanceNames(
+    CMPIInstanceMI*, const CMPIContext*, const CMPIResult* rslt, const CMPIObjectPath* ref)
+{
+    return enumerateInstanceNames(capabilities(), broker,
+        "SensorEnabledLogicalElementCapabilities_EnumInstanceNames", {74, {90, 92}, 114}, rslt,
+        ref);
+}
+
+CMPIStatus SensorEnabledLogicalElementCapabilities_EnumInstances(CMPIInstanceMI*,
+    const CMPIContext*, const CMPIResult* rslt, const CMPIObjectPath* ref, const char** properties)
+{
+    return enumerateInstances(capabilities(), broker,
+        "SensorEnabledLogicalElementCapabilities_EnumInstances", {137, {153, 155}, 169}, rslt, ref,
+        properties);
+}
+
+CMPIStatus SensorEnabledLogicalElementCapabilities_GetInstance(CMPIInstanceMI*, const CMPIContext*,
+    const CMPIResult* rslt, const CMPIObjectPath* ref, const char** properties)
+{
+    return getInstance(capabilities(), broker,
+        "SensorEnabledLogicalElementCapabilities_GetInstance", {191, {215, 217}, {243, 245}, 283},
+        rslt, ref, properties);
+}
+
+namespace {
+
 constexpr auto SensorEnabledLogicalElementCapabilities_Cleanup = cleanUpNothing;
-constexpr auto SensorEnabledLogicalElementCapabilities_EnumInstanceNames =
-    enumerateNamesNotSupported;
-constexpr auto SensorEnabledLogicalElementCapabilities_EnumInstances = readNotSupported;
-constexpr auto SensorEnabledLogicalElementCapabilities_GetInstance = readNotSupported;
 constexpr auto SensorEnabledLogicalElementCapabilities_CreateInstance = createNotSupported;
 constexpr auto SensorEnabledLogicalElementCapabilities_ModifyInstance = modifyNotSupported;
 constexpr auto SensorEnabledLogicalElementCapabilities_DeleteInstance = deleteNotSupported;

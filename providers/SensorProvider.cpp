@@ -2,13 +2,9 @@
 
 // The instance provider of ZUMLO_NumericSensor.
 
-#include "factory/BrokerCalls.h"
 #include "factory/ClassNames.h"
-#include "factory/SensorFactory.h"
+#include "providers/InstanceRequests.h"
 #include "providers/NotSupported.h"
-#include "providers/RequestHandler.h"
-
-#include <cmpimacs.h>
 
 #include <string>
 
@@ -20,43 +16,21 @@ const CMPIBroker* broker = nullptr;
 
 const std::string loggerSensorProvider = "Nimbrel.SensorProfileProvider";
 
-TraceModule module()
+RecordClass sensors()
 {
-    return {loggerSensorProvider, "SensorProvider"};
-}
-
-// The instance of one device identifier. False when the handler is to end here: there is no
-// such sensor, which has been said in the trace.
-bool returnByDeviceID(const HandlerMarks& marks, const CMPIResult* rslt, const CMPIObjectPath* ref,
-    CMPIString* deviceID, const char** properties, CMPIStatus* status)
-{
-    SensorFactory factory(true, false);
-    std::vector<CMPIInstance*> instances;
-    instances.reserve(factory.getNumberOfInstances());
-    if (factory.getOneSensorCMPIInstance(broker, ref, deviceID, properties, instances, status)) {
-        marks.failure(220, "getOneSensorCMPIInstance failed");
-        marks.exit(222);
-        return false;
-    }
-    returnInstances(rslt, instances);
-    return true;
-}
-
-// The instance whose object path equals the request's, for a path that names no device
-// identifier. False as above.
-bool returnByPath(const HandlerMarks& marks, const CMPIResult* rslt, const CMPIObjectPath* ref,
-    const char** properties, CMPIStatus* status)
-{
-    SensorFactory factory(true, false);
-    std::vector<CMPIInstance*> instances;
-    instances.reserve(factory.getNumberOfInstances());
-    if (factory.getAllSensorCMPIInstances(broker, ref, properties, false, instances, status)) {
-        marks.failure(251, "getAllSensorCMPIInstances failed");
-        marks.exit(253);
-        return false;
-    }
-    returnInstanceAt(rslt, ref, instances, false, status);
-    return true;
+    return {
+        .module = {loggerSensorProvider, "SensorProvider"},
+        .provider = SensorProfileProvider,
+        .key = "DeviceID",
+        .isCap = false,
+        .reservesForEachSensor = true,
+        .paths = &SensorFactory::getAllSensorCMPIObjPaths,
+        .instances = &SensorFactory::getAllSensorCMPIInstances,
+        .one = &SensorFactory::getOneSensorCMPIInstance,
+        .pathsFailed = "getAllSensorCMPIObjPaths failed",
+        .instancesFailed = "getAllSensorCMPIInstances failed",
+        .oneFailed = "getOneSensorCMPIInstance failed",
+    };
 }
 
 } // namespace
@@ -64,60 +38,22 @@ bool returnByPath(const HandlerMarks& marks, const CMPIResult* rslt, const CMPIO
 CMPIStatus Sensor_EnumInstanceNames(
     CMPIInstanceMI*, const CMPIContext*, const CMPIResult* rslt, const CMPIObjectPath* ref)
 {
-    const HandlerMarks marks(module(), "Sensor_EnumInstanceNames");
-    marks.entry(74);
-    CMPIStatus status = {CMPI_RC_OK, nullptr};
-    std::vector<CMPIObjectPath*> paths;
-    SensorFactory factory(true, false);
-    paths.reserve(factory.getNumberOfInstances());
-    if (factory.getAllSensorCMPIObjPaths(broker, ref, paths, &status)) {
-        marks.failure(94, "getAllSensorCMPIObjPaths failed");
-        marks.exit(96);
-        return status; // OK and an open, empty result on a machine without sensors
-    }
-    returnPaths(rslt, ref, paths, &status);
-    CMReturnDone(rslt);
-    marks.exit(114);
-    return status;
+    return enumerateInstanceNames(
+        sensors(), broker, "Sensor_EnumInstanceNames", {74, {94, 96}, 114}, rslt, ref);
 }
 
 CMPIStatus Sensor_EnumInstances(CMPIInstanceMI*, const CMPIContext*, const CMPIResult* rslt,
     const CMPIObjectPath* ref, const char** properties)
 {
-    const HandlerMarks marks(module(), "Sensor_EnumInstances");
-    marks.entry(136);
-    CMPIStatus status = {CMPI_RC_OK, nullptr};
-    std::vector<CMPIInstance*> instances;
-    SensorFactory factory(true, false);
-    instances.reserve(factory.getNumberOfInstances());
-    if (factory.getAllSensorCMPIInstances(broker, ref, properties, false, instances, &status)) {
-        marks.failure(155, "getAllSensorCMPIInstances failed");
-        marks.exit(157);
-        return status;
-    }
-    returnInstances(rslt, instances);
-    CMReturnDone(rslt);
-    marks.exit(170);
-    return status;
+    return enumerateInstances(
+        sensors(), broker, "Sensor_EnumInstances", {136, {155, 157}, 170}, rslt, ref, properties);
 }
 
 CMPIStatus Sensor_GetInstance(CMPIInstanceMI*, const CMPIContext*, const CMPIResult* rslt,
     const CMPIObjectPath* ref, const char** properties)
 {
-    const HandlerMarks marks(module(), "Sensor_GetInstance");
-    marks.entry(192);
-    CMPIStatus status = {CMPI_RC_OK, nullptr};
-    if (keyCountOf(ref, &status) == 0) {
-        reportFailure(broker, &status, SensorProfileProvider, NoKeyPassed, NoKeyPassed);
-    } else if (CMPIString* const deviceID = textKey(ref, "DeviceID", &status)) {
-        if (!returnByDeviceID(marks, rslt, ref, deviceID, properties, &status))
-            return status; // OK without an instance when there is no such sensor
-    } else if (!returnByPath(marks, rslt, ref, properties, &status)) {
-        return status;
-    }
-    CMReturnDone(rslt);
-    marks.exit(293);
-    return status;
+    return getInstance(sensors(), broker, "Sensor_GetInstance", {192, {220, 222}, {251, 253}, 293},
+        rslt, ref, properties);
 }
 
 namespace {

@@ -1,8 +1,9 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The instance and association provider of ZUMLO_SensorSystemDevice.
+// The function tables and factories of the provider of ZUMLO_SensorSystemDevice.
 
 #include "providers/NotSupported.h"
+#include "providers/SensorSystemDevice.h"
 
 #include <string>
 
@@ -10,16 +11,20 @@ namespace Vorn::SensorProfileProvider {
 
 namespace {
 
-// Set by the factories; the handlers that will use it are not served yet.
-[[maybe_unused]] const CMPIBroker* broker = nullptr;
+const std::string loggerSenosrSystemDeviceProvider = "Nimbrel.SenosrSystemDeviceProvider";
 
-[[maybe_unused]] const std::string loggerSenosrSystemDeviceProvider =
-    "Nimbrel.SenosrSystemDeviceProvider";
+} // namespace
+
+const CMPIBroker* SystemDevice::broker = nullptr;
+
+TraceModule SystemDevice::module()
+{
+    return {loggerSenosrSystemDeviceProvider, "SensorSystemDeviceProvider"};
+}
+
+namespace {
 
 constexpr auto SensorSystemDevice_Cleanup = cleanUpNothing;
-constexpr auto SensorSystemDevice_EnumInstanceNames = enumerateNamesNotSupported;
-constexpr auto SensorSystemDevice_EnumInstances = readNotSupported;
-constexpr auto SensorSystemDevice_GetInstance = readNotSupported;
 constexpr auto SensorSystemDevice_CreateInstance = createNotSupported;
 constexpr auto SensorSystemDevice_ModifyInstance = modifyNotSupported;
 constexpr auto SensorSystemDevice_DeleteInstance = deleteNotSupported;
@@ -32,10 +37,6 @@ const CMPIInstanceMIFT instMIFT__ = {200, 200, "instanceSensorSystemDeviceProvid
     SensorSystemDevice_DeleteInstance, SensorSystemDevice_ExecQuery};
 
 constexpr auto SensorSystemDevice_AssociationCleanup = cleanUpNoAssociation;
-constexpr auto SensorSystemDevice_Associators = associatorsNotSupported;
-constexpr auto SensorSystemDevice_AssociatorNames = associatorNamesNotSupported;
-constexpr auto SensorSystemDevice_References = referencesNotSupported;
-constexpr auto SensorSystemDevice_ReferenceNames = referenceNamesNotSupported;
 
 const CMPIAssociationMIFT assocMIFT__ = {200, 200, "associationSensorSystemDeviceProvider",
     SensorSystemDevice_AssociationCleanup, SensorSystemDevice_Associators,
@@ -49,7 +50,7 @@ SensorSystemDeviceProvider_Create_InstanceMI(
     const CMPIBroker* theBroker, const CMPIContext*, CMPIStatus*)
 {
     static CMPIInstanceMI mi = {nullptr, &instMIFT__};
-    broker = theBroker;
+    SystemDevice::broker = theBroker;
     return &mi;
 }
 
@@ -58,7 +59,7 @@ SensorSystemDeviceProvider_Create_AssociationMI(
     const CMPIBroker* theBroker, const CMPIContext*, CMPIStatus*)
 {
     static CMPIAssociationMI mi = {nullptr, &assocMIFT__};
-    broker = theBroker;
+    SystemDevice::broker = theBroker;
     return &mi;
 }
 

@@ -151,8 +151,8 @@ CMPI_INLINE CMPIString* CDGetType(const CMPIBroker* broker, const void* object, 
 
 /* ---- Broker: messages, logging, tracing ---- */
 
-#define CMGetMessage(broker, file, id, text, rc, ...) \
-    ((broker)->eft->getMessage((broker), (file), (id), (text), (rc), __VA_ARGS__))
+#define CMGetMessage(broker, id, text, rc, ...) \
+    ((broker)->eft->getMessage((broker), (id), (text), (rc), __VA_ARGS__))
 #define CMGetMessage2(broker, id, file, text, rc, ...) \
     ((broker)->eft->getMessage2((broker), (id), (file), (text), (rc), __VA_ARGS__))
 

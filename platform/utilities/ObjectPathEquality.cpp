@@ -21,19 +21,6 @@ struct Key {
     KeyValue value;
 };
 
-// CIM names are ASCII or compared as such; the process's locale has no say.
-char lowered(char character)
-{
-    return character >= 'A' && character <= 'Z' ? static_cast<char>(character - 'A' + 'a')
-                                                : character;
-}
-
-bool sameName(std::string_view a, std::string_view b)
-{
-    return std::equal(a.begin(), a.end(), b.begin(), b.end(),
-        [](char x, char y) { return lowered(x) == lowered(y); });
-}
-
 bool isUsable(const CMPIObjectPath* path)
 {
     return path != nullptr && path->hdl != nullptr && path->ft != nullptr;
@@ -62,7 +49,7 @@ bool sameNamespace(const CMPIObjectPath* a, const CMPIObjectPath* b)
 {
     const std::string_view namespaceA = namespaceOf(a);
     const std::string_view namespaceB = namespaceOf(b);
-    return namespaceA.empty() || namespaceB.empty() || sameName(namespaceA, namespaceB);
+    return namespaceA.empty() || namespaceB.empty() || isSameName(namespaceA, namespaceB);
 }
 
 // The keys that count; nothing when the broker fails to list them.
@@ -124,7 +111,7 @@ bool equalKeys(
         return false;
     for (const Key& key : keys) {
         const auto partner = std::find_if(partners.begin(), partners.end(),
-            [&](const Key& other) { return sameName(key.name, other.name); });
+            [&](const Key& other) { return isSameName(key.name, other.name); });
         if (partner == partners.end() || !std::visit(sameValue, key.value, partner->value))
             return false;
         partners.erase(partner);
@@ -138,7 +125,7 @@ bool equalPaths(
     if (depth > deepestPath || !isUsable(a) || !isUsable(b))
         return false;
     const std::string_view name = className(a);
-    if (name.empty() || !sameName(name, className(b)) || !sameNamespace(a, b))
+    if (name.empty() || !isSameName(name, className(b)) || !sameNamespace(a, b))
         return false;
     const auto keysA = keysOf(a, comparesReferences);
     if (!keysA)

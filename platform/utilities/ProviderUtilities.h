@@ -7,6 +7,7 @@
 #include <cmpidt.h>
 
 #include <string>
+#include <string_view>
 
 namespace Vorn {
 
@@ -21,6 +22,10 @@ std::string stripSpaces(const std::string& text);
 // never throws but for lack of memory.
 std::string make_string(const std::wstring& text);
 std::wstring make_wstring(const std::string& text);
+
+// Whether two CIM names (of a class, a property, a namespace) are the same: without regard to
+// ASCII case, whatever the process's locale.
+bool isSameName(std::string_view a, std::string_view b);
 
 // Whether two object paths name the same instance.
 //

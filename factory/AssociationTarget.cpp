@@ -1,0 +1,100 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// What lies at the far end of an association.
+
+#include "factory/BrokerCalls.h"
+#include "factory/ClassNames.h"
+#include "factory/FactoryModule.h"
+#include "factory/SensorFactory.h"
+
+#include <array>
+#include <cstring>
+
+namespace Vorn::SensorProfileProvider {
+
+namespace {
+
+struct AssociationEnd {
+    const char* sourceClass;
+    const char* associationClass;
+    const char* targetClass;
+    const char* provider;
+    const char* traceText; // whatever class it names: scripts look for it
+    unsigned exitingLine;
+};
+
+constexpr const char* TargetIsPackage = "Target Class is PhysicalPackageClass";
+constexpr const char* TargetIsSystem = "Target Class is ComputerSystemClass";
+constexpr unsigned NoTargetLine = 1259;
+
+constexpr std::array<AssociationEnd, 4> AssociationEnds = {{
+    {ComputerSystemClass, SensorSystemDeviceClass, SensorClass, SensorSystemDeviceProvider,
+        TargetIsPackage, 1205},
+    {SensorClass, SensorSystemDeviceClass, ComputerSystemClass, SensorSystemDeviceProvider,
+        TargetIsSystem, 1221},
+    {SensorClass, SensorElementCapabilitiesClass, SensorEnabledLogicalElementCapClass,
+        SensorElementCapabilitiesProvider, TargetIsPackage, 1236},
+    {SensorEnabledLogicalElementCapClass, SensorElementCapabilitiesClass, SensorClass,
+        SensorElementCapabilitiesProvider, TargetIsSystem, 1252},
+}};
+
+// Letter for letter; what was not given equals nothing.
+bool areEqual(const char* one, const char* other)
+{
+    return one != nullptr && other != nullptr && std::strcmp(one, other) == 0;
+}
+
+// The string's characters are read afresh for each row: a broker may move them.
+const AssociationEnd* findEnd(
+    const CMPIString* sourceClass, const char* associationClass, CMPIStatus* rc)
+{
+    for (const AssociationEnd& end : AssociationEnds)
+        if (areEqual(charactersOf(sourceClass, rc), end.sourceClass) &&
+            areEqual(associationClass, end.associationClass))
+            return &end;
+    return nullptr;
+}
+
+auto associationParameters(const CMPIBroker* const& broker, const CMPIObjectPath* const& ref,
+    const char* const& left, const char* const& right, CMPIStatus* const& rc)
+{
+    return [&] {
+        return parameterList(" broker=", broker, " ref=", ref, " _RefLeftClass=", left,
+            " _RefRightClass=", right, " rc=", rc);
+    };
+}
+
+} // namespace
+
+const char* SensorFactory::get_assoc_targetClass_Name(const CMPIBroker* broker,
+    const CMPIObjectPath* ref, const char* _RefLeftClass, const char* _RefRightClass,
+    CMPIStatus* rc)
+{
+    const TracedOperation traced(factoryModule(), "get_assoc_targetClass_Name",
+        associationParameters(broker, ref, _RefLeftClass, _RefRightClass, rc));
+    traced.entering(1185);
+    const AssociationEnd* const end = findEnd(classNameOf(ref, rc), _RefLeftClass, rc);
+    if (end == nullptr) {
+        traced.exiting(NoTargetLine);
+        return nullptr;
+    }
+    traceToBroker(broker, CMPI_LEV_INFO, end->provider, end->traceText);
+    traced.exiting(end->exitingLine);
+    return end->targetClass;
+}
+
+CMPIObjectPath* SensorFactory::get_assoc_targetClass_ObjectPath(const CMPIBroker* broker,
+    const CMPIObjectPath* ref, const char* _RefLeftClass, const char* _RefRightClass,
+    CMPIStatus* rc)
+{
+    const TracedOperation traced(factoryModule(), "get_assoc_targetClass_ObjectPath",
+        associationParameters(broker, ref, _RefLeftClass, _RefRightClass, rc));
+    traced.entering(1288);
+    const char* const target =
+        get_assoc_targetClass_Name(broker, ref, _RefLeftClass, _RefRightClass, rc);
+    CMPIObjectPath* const path = target ? newPath(broker, ref, target, rc) : nullptr;
+    traced.exiting(1316);
+    return path;
+}
+
+} // namespace Vorn::SensorProfileProvider

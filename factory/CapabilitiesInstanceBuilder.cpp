@@ -1,0 +1,66 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// From a capabilities record to an instance of ZUMLO_SensorEnabledLogicalElementCapabilities.
+
+#include "factory/BrokerCalls.h"
+#include "factory/ClassNames.h"
+#include "factory/FactoryModule.h"
+#include "factory/InstanceWriter.h"
+#include "factory/PropertySelection.h"
+#include "factory/SensorFactory.h"
+
+#include <cmpimacs.h>
+
+namespace Vorn::SensorProfileProvider {
+
+namespace {
+
+// The instance with its filter. Null, or the handle-less instance the broker returned, when
+// there is none to go on with.
+CMPIInstance* newCapabilitiesInstance(
+    const CMPIBroker* broker, const CMPIObjectPath* ref, const char** properties, CMPIStatus* rc)
+{
+    const CMPIObjectPath* const path =
+        newPath(broker, ref, SensorEnabledLogicalElementCapClass, rc);
+    if (path == nullptr)
+        return nullptr;
+    CMPIInstance* const instance = CMNewInstance(broker, path, nullptr);
+    if (isUsable(instance)) {
+        const char* keys[] = {"InstanceID", nullptr};
+        CMSetPropertyFilter(instance, properties, keys);
+    }
+    return instance;
+}
+
+} // namespace
+
+CMPIInstance* SensorFactory::makeSensorEnabledLogicalElementCapInstance(const CMPIBroker* broker,
+    const CMPIObjectPath* ref, SensorEnabledLogCap snsrCap, const char** properties, bool isObjPath,
+    CMPIStatus* rc)
+{
+    const TracedOperation traced(
+        factoryModule(), "makeSensorEnabledLogicalElementCapInstance", [&] {
+            return parameterList(" broker=", broker, " ref=", ref, " snsrCap=", &snsrCap,
+                " properties=", properties, " IsObjPath=", isObjPath, " rc=", rc);
+        });
+    traced.entering(863);
+    const PropertySelection selection(properties, isObjPath);
+    CMPIInstance* const instance = newCapabilitiesInstance(broker, ref, properties, rc);
+    if (isUsable(instance)) {
+        const InstanceWriter writer(broker, instance);
+        writer.setText("InstanceID", snsrCap.getInstanceID());
+        if (selection.wants("RequestedStatesSupported") &&
+            !writer.setCodes("RequestedStatesSupported", snsrCap.getStatesSupported(), rc))
+            // The texts differ in one letter.
+            reportFailure(broker, rc, SensorEnabledLogicalElementCapabilitiesProvider,
+                "Creating array for Property                         "
+                "RequestedStatesSupported failed.",
+                "Creating Array for Property                         "
+                "RequestedStatesSupported failed.");
+        writer.setFlag("ElementNameEditSupported", snsrCap.getElementNameEditSupported());
+    }
+    traced.exiting(965);
+    return instance;
+}
+
+} // namespace Vorn::SensorProfileProvider

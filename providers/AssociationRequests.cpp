@@ -1,0 +1,74 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "providers/AssociationRequests.h"
+
+#include <string>
+
+namespace Vorn::SensorProfileProvider {
+
+namespace {
+
+bool isOf(const CMPIData& element, CMPIType type)
+{
+    return element.type == type && (element.state & (CMPI_nullValue | CMPI_notFound)) == 0;
+}
+
+} // namespace
+
+void AssociationRequest::failWithoutTarget(
+    const char* text, CMPIStatus* status, unsigned line) const
+{
+    const std::string sentence = std::string(text) + '.';
+    fail({sentence.c_str(), sentence.c_str(), text}, status, line);
+    marks_.exit(line);
+}
+
+void addReferenceKeys(const CMPIObjectPath* path, const References& references)
+{
+    for (const Reference& reference : references)
+        CMAddKey(path, reference.role, &reference.path, CMPI_ref);
+}
+
+CMPIInstance* newAssociation(const CMPIBroker* broker, const CMPIObjectPath* path,
+    const References& references, const char** properties, const char** keys)
+{
+    CMPIInstance* const instance = CMNewInstance(broker, path, nullptr);
+    if (!isUsable(instance))
+        return instance;
+    if (keys != nullptr)
+        CMSetPropertyFilter(instance, properties, keys);
+    for (const Reference& reference : references)
+        CMSetProperty(instance, reference.role, &reference.path, CMPI_ref);
+    return instance;
+}
+
+void returnAssociations(Answer answer, const CMPIResult* rslt, const CMPIObjectPath* op,
+    const std::vector<CMPIInstance*>& associations, CMPIStatus* status)
+{
+    forEachCounted(associations, [&](const CMPIInstance* association) {
+        if (!isUsable(association))
+            return;
+        if (answer == Answer::instances) {
+            CMReturnInstance(rslt, association);
+            return;
+        }
+        const CMPIObjectPath* const path = CMGetObjectPath(association, status);
+        if (!isUsable(path))
+            return;
+        copyNameSpace(path, op, status);
+        CMReturnObjectPath(rslt, path);
+    });
+}
+
+CMPIObjectPath* pathOf(const CMPIData& element)
+{
+    return isOf(element, CMPI_ref) && isUsable(element.value.ref) ? element.value.ref : nullptr;
+}
+
+CMPIInstance* instanceOf(const CMPIData& element)
+{
+    return isOf(element, CMPI_instance) && isUsable(element.value.inst) ? element.value.inst
+                                                                        : nullptr;
+}
+
+} // namespace Vorn::SensorProfileProvider

@@ -1,0 +1,142 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// What the handlers of the two association providers share.
+
+#pragma once
+
+#include "factory/BrokerCalls.h"
+#include "factory/SensorFactory.h"
+#include "providers/RequestHandler.h"
+
+#include <cmpidt.h>
+#include <cmpimacs.h>
+
+#include <array>
+#include <vector>
+
+namespace Vorn::SensorProfileProvider {
+
+// Whether a request wants objects or only their paths.
+enum class Answer { instances, paths };
+
+// One end of an association: the reference property and what it refers to.
+struct Reference {
+    const char* role;
+    const CMPIObjectPath* path;
+};
+using References = std::array<Reference, 2>;
+
+// How one failure reads for the client, in the broker's trace and in a message line.
+struct FailureTexts {
+    const char* status;
+    const char* trace;
+    const char* message; // null for no message line
+};
+
+// One request to an association provider: its marks and how it reports failures. The trace
+// lines it writes carry the caller's line.
+class AssociationRequest {
+public:
+    // `provider` is the component of broker trace messages. Writes the entry mark.
+    AssociationRequest(const TraceModule& module, const char* provider, const CMPIBroker* broker,
+        const char* function, unsigned line = __builtin_LINE())
+        : marks_(module, function), provider_(provider), broker_(broker)
+    {
+        marks_.entry(line);
+    }
+
+    const HandlerMarks& marks() const { return marks_; }
+
+    void fail(const FailureTexts& texts, CMPIStatus* status, unsigned line = __builtin_LINE()) const
+    {
+        reportFailure(broker_, status, provider_, texts.status, texts.trace);
+        if (texts.message)
+            marks_.failure(texts.message, line);
+    }
+
+    // What the source's class has no far end in this association is answered with.
+    void failWithoutTarget(
+        const char* text, CMPIStatus* status, unsigned line = __builtin_LINE()) const;
+
+    // Finds the instance of the request's path among all that `build(instances)` makes (0 for
+    // success), and ends the request.
+    template <typename Build>
+    CMPIStatus getInstance(const CMPIResult* rslt, const CMPIObjectPath* op, const Build& build,
+        unsigned line = __builtin_LINE()) const
+    {
+        CMPIStatus status = {CMPI_RC_OK, nullptr};
+        std::vector<CMPIInstance*> instances;
+        if (keyCountOf(op, &status) == 0)
+            fail({NoKeyPassed, NoKeyPassed, NoKeyPassed}, &status, line);
+        else if (build(instances) == 0)
+            returnInstanceAt(rslt, op, instances, true, &status);
+        marks_.exit(line);
+        CMReturnDone(rslt);
+        return status;
+    }
+
+    // Hands over all that `build(instances)` makes, and ends the request: well, whatever comes
+    // of the building.
+    template <typename Build>
+    CMPIStatus enumerateInstances(
+        const CMPIResult* rslt, const Build& build, unsigned line = __builtin_LINE()) const
+    {
+        std::vector<CMPIInstance*> instances;
+        if (build(instances) == 0)
+            returnInstances(rslt, instances);
+        marks_.exit(line);
+        CMReturnDone(rslt);
+        return {CMPI_RC_OK, nullptr};
+    }
+
+private:
+    HandlerMarks marks_;
+    const char* provider_;
+    const CMPIBroker* broker_;
+};
+
+// The association class that a request for associated objects names; the provider's own where
+// the object manager hands over none.
+inline const char* namedOrOwn(const char* assocClass, const char* own)
+{
+    return assocClass ? assocClass : own;
+}
+
+void addReferenceKeys(const CMPIObjectPath* path, const References& references);
+
+// An instance at the path, with its references as properties. `properties` and `keys` are its
+// filter; no filter when `keys` is null. Null, or the handle-less instance the broker returned,
+// when there is none.
+CMPIInstance* newAssociation(const CMPIBroker* broker, const CMPIObjectPath* path,
+    const References& references, const char** properties, const char** keys);
+
+// Hands over the association instances, or their paths with the namespace of the request.
+// What the broker could not make is left out.
+void returnAssociations(Answer answer, const CMPIResult* rslt, const CMPIObjectPath* op,
+    const std::vector<CMPIInstance*>& associations, CMPIStatus* status);
+
+// Visits the elements of an up-call's answer until there are no more, `visit` returns false or
+// the broker fails: then the result is false and its status stands in `status`. No answer has no
+// elements.
+template <typename Visit>
+bool forEachElement(const CMPIEnumeration* elements, CMPIStatus* status, const Visit& visit)
+{
+    if (!isUsable(elements))
+        return true;
+    CMPIStatus step = {CMPI_RC_OK, nullptr};
+    while (CMHasNext(elements, &step) && step.rc == CMPI_RC_OK) {
+        const CMPIData element = CMGetNext(elements, &step);
+        if (step.rc != CMPI_RC_OK || !visit(element))
+            break;
+    }
+    if (step.rc == CMPI_RC_OK)
+        return true;
+    *status = step;
+    return false;
+}
+
+// The path or the instance of an element; null when it is none.
+CMPIObjectPath* pathOf(const CMPIData& element);
+CMPIInstance* instanceOf(const CMPIData& element);
+
+} // namespace Vorn::SensorProfileProvider

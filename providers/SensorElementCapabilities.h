@@ -1,0 +1,49 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// What the files of the ZUMLO_SensorElementCapabilities provider share: each sensor (role
+// ManagedElement) is tied to each capabilities instance (role Capabilities).
+
+#pragma once
+
+#include "include/TracedOperation.h"
+
+#include <cmpidt.h>
+
+#include <vector>
+
+namespace Vorn::SensorProfileProvider {
+
+namespace ElementCapabilities {
+
+extern const CMPIBroker* broker; // written by the factories, before requests come
+
+TraceModule module();
+
+} // namespace ElementCapabilities
+
+// Appends every instance of the association, sensor by sensor; an instance that the broker does
+// not make is null or without a handle. Returns 0, or 1 when it failed or there are no sensors,
+// which stands in the traces alone.
+int sensorElementCapabilitiesCMPIInstances(
+    const CMPIObjectPath* op, const char** properties, std::vector<CMPIInstance*>& out);
+
+CMPIStatus SensorElementCapabilities_EnumInstanceNames(
+    CMPIInstanceMI* mi, const CMPIContext* ctx, const CMPIResult* rslt, const CMPIObjectPath* op);
+CMPIStatus SensorElementCapabilities_EnumInstances(CMPIInstanceMI* mi, const CMPIContext* ctx,
+    const CMPIResult* rslt, const CMPIObjectPath* op, const char** properties);
+CMPIStatus SensorElementCapabilities_GetInstance(CMPIInstanceMI* mi, const CMPIContext* ctx,
+    const CMPIResult* rslt, const CMPIObjectPath* op, const char** properties);
+
+CMPIStatus SensorElementCapabilities_Associators(CMPIAssociationMI* mi, const CMPIContext* ctx,
+    const CMPIResult* rslt, const CMPIObjectPath* op, const char* assocClass,
+    const char* resultClass, const char* role, const char* resultRole, const char** properties);
+CMPIStatus SensorElementCapabilities_AssociatorNames(CMPIAssociationMI* mi, const CMPIContext* ctx,
+    const CMPIResult* rslt, const CMPIObjectPath* op, const char* assocClass,
+    const char* resultClass, const char* role, const char* resultRole);
+CMPIStatus SensorElementCapabilities_References(CMPIAssociationMI* mi, const CMPIContext* ctx,
+    const CMPIResult* rslt, const CMPIObjectPath* op, const char* resultClass, const char* role,
+    const char** properties);
+CMPIStatus SensorElementCapabilities_ReferenceNames(CMPIAssociationMI* mi, const CMPIContext* ctx,
+    const CMPIResult* rslt, const CMPIObjectPath* op, const char* resultClass, const char* role);
+
+} // namespace Vorn::SensorProfileProvider

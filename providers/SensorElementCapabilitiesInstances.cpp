@@ -1,0 +1,206 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// The instances of ZUMLO_SensorElementCapabilities: each sensor with each capabilities instance.
+
+#include "factory/ClassNames.h"
+#include "providers/AssociationRequests.h"
+#include "providers/SensorElementCapabilities.h"
+
+#include <cstdint>
+
+namespace Vorn::SensorProfileProvider {
+
+using namespace ElementCapabilities;
+
+namespace {
+
+// What the factory answers a fetch of paths with.
+constexpr int NothingFound = 1;
+
+// How the failures of a walk over all pairs are reported. The runs of blanks are part of the
+// texts.
+struct PairFailures {
+    FailureTexts sensor;
+    FailureTexts capabilities;
+    FailureTexts association;
+};
+
+constexpr PairFailures InstanceFailures = {
+    {"CMPIObjectPath is                 NULL for Sensor", "CMPIObjectPath is NULL for Sensor",
+        "CMPIObjectPath is NULL for Sensor"},
+    {"CMPIObjectPath is                     NULL for EnabledLogicalElementCap",
+        "CMPIObjectPath is NULL for EnabledLogicalElementCap",
+        "CMPIObjectPath is NULL for EnabledLogicalElementCap"},
+    {"Create CMPIObjectPath failed for ElementCapabilities",
+        "Create CMPIObjectPath failed for ElementCapabilities.",
+        "Create CMPIObjectPath failed for ElementCapabilities"},
+};
+
+constexpr PairFailures NameFailures = {
+    {"CMPIObjectPath is NULL for Sensor class", "CMPIObjectPath is NULL for Sensor class",
+        "CMPIObjectPath is NULL for Sensor class"},
+    {"CMPIObjectPath is                     NULL for SensorEnabledLogicalElementCap",
+        "CMPIObjectPath is NULL for                     EnabledLogicalElementCap",
+        "CMPIObjectPath is                     NULL for SensorEnabledLogicalElementCap"},
+    {"Create CMPIObjectPath failed                     for ElementCapabilities",
+        "Create CMPIObjectPath failed                     for ElementCapabilities.",
+        "Create CMPIObjectPath failed                     for ElementCapabilities"},
+};
+
+// Where a walk ended.
+enum class WalkEnd { complete, atSensors, atCapabilities, reported };
+
+// All pairs in order, sensor by sensor.
+class PairWalk {
+public:
+    PairWalk(const AssociationRequest& request, const PairFailures& failures,
+        const CMPIObjectPath* op, CMPIStatus* status)
+        : request_(request), failures_(failures), op_(op), status_(status)
+    {
+    }
+
+    // Makes room for one object for each sensor.
+    template <typename Object>
+    void reserve(std::vector<Object*>& objects)
+    {
+        objects.reserve(factory_.getNumberOfInstances());
+    }
+
+    // Calls `visit` with the association's path, without keys, and its references.
+    template <typename Visit>
+    WalkEnd run(const Visit& visit)
+    {
+        std::vector<CMPIObjectPath*> sensors;
+        reserve(sensors);
+        result_ = factory_.getAllSensorCMPIObjPaths(broker, op_, sensors, status_);
+        if (result_ != 0)
+            return WalkEnd::atSensors;
+        const auto count = static_cast<std::uint16_t>(sensors.size());
+        for (std::uint16_t i = 0; i < count; ++i) {
+            const WalkEnd end = walkCapabilities(sensors.at(i), visit);
+            if (end != WalkEnd::complete)
+                return end;
+        }
+        return WalkEnd::complete;
+    }
+
+    // What the factory answered at the end of the walk.
+    int factoryResult() const { return result_; }
+
+private:
+    template <typename Visit>
+    WalkEnd walkCapabilities(CMPIObjectPath* sensor, const Visit& visit)
+    {
+        if (!isUsable(sensor))
+            return report(failures_.sensor);
+        copyNameSpace(sensor, op_, status_);
+        std::vector<CMPIObjectPath*> capabilities;
+        capabilities.reserve(1);
+        result_ = factory_.getAllSensorEnabledLogicalElementCapCMPIObjPaths(
+            broker, op_, capabilities, status_);
+        if (result_ != 0)
+            return WalkEnd::atCapabilities;
+        const auto count = static_cast<std::uint16_t>(capabilities.size());
+        for (std::uint16_t i = 0; i < count; ++i) {
+            CMPIObjectPath* const path = capabilities.at(i);
+            if (!isUsable(path))
+                return report(failures_.capabilities);
+            copyNameSpace(path, op_, status_);
+            copyNameSpace(sensor, op_, status_);
+            CMPIObjectPath* const association =
+                newPath(broker, op_, SensorElementCapabilitiesClass, status_);
+            if (association == nullptr)
+                return report(failures_.association);
+            visit(association, References{{{"ManagedElement", sensor}, {"Capabilities", path}}});
+        }
+        return WalkEnd::complete;
+    }
+
+    WalkEnd report(const FailureTexts& texts)
+    {
+        request_.fail(texts, status_);
+        return WalkEnd::reported;
+    }
+
+    const AssociationRequest& request_;
+    const PairFailures& failures_;
+    const CMPIObjectPath* op_;
+    CMPIStatus* status_;
+    SensorFactory factory_{true, true};
+    int result_ = 0;
+};
+
+} // namespace
+
+int sensorElementCapabilitiesCMPIInstances(
+    const CMPIObjectPath* op, const char** properties, std::vector<CMPIInstance*>& out)
+{
+    const AssociationRequest request(module(), SensorElementCapabilitiesProvider, broker,
+        "sensorElementCapabilitiesCMPIInstances");
+    CMPIStatus status = {CMPI_RC_OK, nullptr};
+    PairWalk walk(request, InstanceFailures, op, &status);
+    walk.reserve(out);
+    // Not the names of this association's references, but what the filter has always held.
+    const char* keys[] = {"Antecedent", "Dependent", nullptr};
+    const WalkEnd end =
+        walk.run([&](const CMPIObjectPath* association, const References& references) {
+            out.push_back(newAssociation(broker, association, references, properties, keys));
+        });
+    if (end == WalkEnd::atSensors) {
+        traceToBroker(broker, CMPI_LEV_WARNING, SensorElementCapabilitiesProvider,
+            "***Can't get Sensor ObjectPaths.             Exiting EnumerateInstanceNames***");
+        request.marks().failure("getAllSensorCMPIObjPaths failed");
+    } else if (end == WalkEnd::atCapabilities) {
+        traceToBroker(broker, CMPI_LEV_WARNING, SensorElementCapabilitiesProvider,
+            "***Can't get ObjectPaths for                 EnabledLogicalElementCap"
+            "                 Exiting EnumerateInstanceNames***");
+        request.marks().failure("getAllSensorEnabledLogicalElementCapCMPIObjPaths failed");
+    }
+    request.marks().exit();
+    return end == WalkEnd::complete ? 0 : 1;
+}
+
+CMPIStatus SensorElementCapabilities_EnumInstanceNames(
+    CMPIInstanceMI*, const CMPIContext*, const CMPIResult* rslt, const CMPIObjectPath* op)
+{
+    const AssociationRequest request(module(), SensorElementCapabilitiesProvider, broker,
+        "SensorElementCapabilities_EnumInstanceNames");
+    CMPIStatus status = {CMPI_RC_OK, nullptr};
+    PairWalk walk(request, NameFailures, op, &status);
+    const WalkEnd end =
+        walk.run([&](const CMPIObjectPath* association, const References& references) {
+            addReferenceKeys(association, references);
+            CMReturnObjectPath(rslt, association);
+        });
+    if (end == WalkEnd::reported) {
+        request.marks().exit();
+        return status;
+    }
+    if (end != WalkEnd::complete && walk.factoryResult() != NothingFound)
+        return status; // without an exit mark
+    request.marks().exit();
+    CMReturnDone(rslt);
+    return status;
+}
+
+CMPIStatus SensorElementCapabilities_EnumInstances(CMPIInstanceMI*, const CMPIContext*,
+    const CMPIResult* rslt, const CMPIObjectPath* op, const char** properties)
+{
+    const AssociationRequest request(module(), SensorElementCapabilitiesProvider, broker,
+        "SensorElementCapabilities_EnumInstances");
+    return request.enumerateInstances(rslt, [&](std::vector<CMPIInstance*>& instances) {
+        return sensorElementCapabilitiesCMPIInstances(op, properties, instances);
+    });
+}
+
+CMPIStatus SensorElementCapabilities_GetInstance(CMPIInstanceMI*, const CMPIContext*,
+    const CMPIResult* rslt, const CMPIObjectPath* op, const char** properties)
+{
+    const AssociationRequest request(module(), SensorElementCapabilitiesProvider, broker,
+        "SensorElementCapabilities_GetInstance");
+    return request.getInstance(rslt, op, [&](std::vector<CMPIInstance*>& instances) {
+        return sensorElementCapabilitiesCMPIInstances(op, properties, instances);
+    });
+}
+
+} // namespace Vorn::SensorProfileProvider

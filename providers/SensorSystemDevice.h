@@ -1,0 +1,49 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// What the files of the ZUMLO_SensorSystemDevice provider share: each computer system that the
+// object manager knows (role GroupComponent) is tied to each sensor (role PartComponent).
+
+#pragma once
+
+#include "include/TracedOperation.h"
+
+#include <cmpidt.h>
+
+#include <vector>
+
+namespace Vorn::SensorProfileProvider {
+
+namespace SystemDevice {
+
+extern const CMPIBroker* broker; // written by the factories, before requests come
+
+TraceModule module();
+
+} // namespace SystemDevice
+
+// Appends every instance of the association, system by system; an instance that the broker does
+// not make is null or without a handle. Returns 0, or 1 when it failed or there are no sensors
+// where there is a system, which stands in the traces alone.
+int sensorSystemDeviceCMPIInstances(const CMPIObjectPath* op, const char** properties,
+    const CMPIContext* ctx, std::vector<CMPIInstance*>& out);
+
+CMPIStatus SensorSystemDevice_EnumInstanceNames(
+    CMPIInstanceMI* mi, const CMPIContext* ctx, const CMPIResult* rslt, const CMPIObjectPath* op);
+CMPIStatus SensorSystemDevice_EnumInstances(CMPIInstanceMI* mi, const CMPIContext* ctx,
+    const CMPIResult* rslt, const CMPIObjectPath* op, const char** properties);
+CMPIStatus SensorSystemDevice_GetInstance(CMPIInstanceMI* mi, const CMPIContext* ctx,
+    const CMPIResult* rslt, const CMPIObjectPath* op, const char** properties);
+
+CMPIStatus SensorSystemDevice_Associators(CMPIAssociationMI* mi, const CMPIContext* ctx,
+    const CMPIResult* rslt, const CMPIObjectPath* op, const char* assocClass,
+    const char* resultClass, const char* role, const char* resultRole, const char** properties);
+CMPIStatus SensorSystemDevice_AssociatorNames(CMPIAssociationMI* mi, const CMPIContext* ctx,
+    const CMPIResult* rslt, const CMPIObjectPath* op, const char* assocClass,
+    const char* resultClass, const char* role, const char* resultRole);
+CMPIStatus SensorSystemDevice_References(CMPIAssociationMI* mi, const CMPIContext* ctx,
+    const CMPIResult* rslt, const CMPIObjectPath* op, const char* resultClass, const char* role,
+    const char** properties);
+CMPIStatus SensorSystemDevice_ReferenceNames(CMPIAssociationMI* mi, const CMPIContext* ctx,
+    const CMPIResult* rslt, const CMPIObjectPath* op, const char* resultClass, const char* role);
+
+} // namespace Vorn::SensorProfileProvider

@@ -1,0 +1,197 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// What ZUMLO_SensorSystemDevice leads to. Each computer system has all sensors and all systems
+// have each of them: the source's keys do not matter. No request here closes its result.
+
+#include "factory/ClassNames.h"
+#include "platform/utilities/ProviderUtilities.h"
+#include "providers/AssociationRequests.h"
+#include "providers/SensorSystemDevice.h"
+
+namespace Vorn::SensorProfileProvider {
+
+using namespace SystemDevice;
+
+namespace {
+
+constexpr const char* UpcallFailed = "Call to CBEnumInstances of target Class Failed.";
+constexpr const char* SensorsFailed = "getAllSensorCMPIInstances failed";
+constexpr const char* SensorPathsFailed = "getAllSensorCMPIObjPaths failed";
+
+// Whether a client that named this result class wants objects of the class, or of the standard
+// class it is derived from.
+bool wants(const char* resultClass, const char* className, const char* standardClass)
+{
+    return resultClass == nullptr || isSameName(resultClass, className) ||
+           isSameName(resultClass, standardClass);
+}
+
+// Hands over what the object manager knows of the target's class. False when it fails.
+bool returnSystems(Answer answer, const CMPIContext* ctx, const CMPIResult* rslt,
+    const CMPIObjectPath* target, CMPIStatus* status)
+{
+    const bool wantsInstances = answer == Answer::instances;
+    const CMPIEnumeration* const systems =
+        wantsInstances ? CBEnumInstances(broker, ctx, target, nullptr, status)
+                       : CBEnumInstanceNames(broker, ctx, target, status);
+    if (status->rc != CMPI_RC_OK)
+        return false;
+    forEachElement(systems, status, [&](const CMPIData& element) {
+        if (const CMPIInstance* const instance = instanceOf(element))
+            CMReturnInstance(rslt, instance);
+        else if (const CMPIObjectPath* const path = pathOf(element))
+            CMReturnObjectPath(rslt, path);
+        return true;
+    });
+    return true;
+}
+
+// Hands over the sensors. The text of the failure, null when there is none.
+const char* returnSensors(Answer answer, const CMPIResult* rslt, const CMPIObjectPath* op,
+    const char** properties, SensorFactory& factory, CMPIStatus* status)
+{
+    if (answer == Answer::instances) {
+        std::vector<CMPIInstance*> instances;
+        instances.reserve(factory.getNumberOfInstances());
+        if (factory.getAllSensorCMPIInstances(broker, op, properties, false, instances, status))
+            return SensorsFailed;
+        returnInstances(rslt, instances);
+        return nullptr;
+    }
+    std::vector<CMPIObjectPath*> paths;
+    paths.reserve(factory.getNumberOfInstances());
+    if (factory.getAllSensorCMPIObjPaths(broker, op, paths, status))
+        return SensorPathsFailed;
+    returnPaths(rslt, op, paths, status);
+    return nullptr;
+}
+
+CMPIStatus associators(const char* function, Answer answer, const CMPIContext* ctx,
+    const CMPIResult* rslt, const CMPIObjectPath* op, const char* assocClass,
+    const char* resultClass, const char** properties)
+{
+    constexpr CMPIStatus Ok = {CMPI_RC_OK, nullptr};
+    const AssociationRequest request(module(), SensorSystemDeviceProvider, broker, function);
+    CMPIStatus status = Ok;
+    SensorFactory factory(true, false);
+    const CMPIObjectPath* const target = SensorFactory::get_assoc_targetClass_ObjectPath(
+        broker, op, namedOrOwn(assocClass, SensorSystemDeviceClass), resultClass, &status);
+    if (!isUsable(target)) {
+        request.marks().exit();
+        return Ok; // another provider's source or association
+    }
+    if (isOfClass(target, ComputerSystemClass, &status)) {
+        if (!wants(resultClass, ComputerSystemClass, "CIM_ComputerSystem"))
+            return Ok; // without an exit mark
+        if (!returnSystems(answer, ctx, rslt, target, &status)) {
+            request.marks().failure(UpcallFailed);
+            return status; // without an exit mark
+        }
+    } else if (isOfClass(target, SensorClass, &status)) {
+        if (!wants(resultClass, SensorClass, "CIM_NumericSensor"))
+            return Ok; // without an exit mark
+        if (const char* const failure =
+                returnSensors(answer, rslt, op, properties, factory, &status))
+            request.marks().failure(failure);
+    }
+    request.marks().exit();
+    return status;
+}
+
+// The far ends of the source's associations, of the target's class. The text of the failure,
+// null when there is none.
+const char* fetchFarEnds(const CMPIContext* ctx, const CMPIObjectPath* op,
+    const CMPIObjectPath* target, SensorFactory& factory, std::vector<CMPIObjectPath*>& farEnds,
+    CMPIStatus* status)
+{
+    if (isOfClass(target, SensorClass, status))
+        return factory.getAllSensorCMPIObjPaths(broker, op, farEnds, status) ? SensorPathsFailed
+                                                                             : nullptr;
+    if (!isOfClass(target, ComputerSystemClass, status))
+        return nullptr;
+    const CMPIEnumeration* const systems = CBEnumInstanceNames(broker, ctx, target, status);
+    if (status->rc != CMPI_RC_OK)
+        return UpcallFailed;
+    const bool isWhole = forEachElement(systems, status, [&](const CMPIData& element) {
+        if (CMPIObjectPath* const system = pathOf(element))
+            farEnds.push_back(system);
+        return true;
+    });
+    return isWhole ? nullptr : UpcallFailed;
+}
+
+// One association for each far end: the source stands where the far end does not.
+std::vector<CMPIInstance*> associate(const CMPIObjectPath* association, const CMPIObjectPath* op,
+    const CMPIObjectPath* target, const std::vector<CMPIObjectPath*>& farEnds, CMPIStatus* status)
+{
+    const bool leadsToSensors = isOfClass(target, SensorClass, status);
+    std::vector<CMPIInstance*> associations;
+    associations.reserve(farEnds.size());
+    forEachCounted(farEnds, [&](const CMPIObjectPath* farEnd) {
+        associations.push_back(newAssociation(broker, association,
+            {{{"GroupComponent", leadsToSensors ? op : farEnd},
+                {"PartComponent", leadsToSensors ? farEnd : op}}},
+            nullptr, nullptr));
+    });
+    return associations;
+}
+
+CMPIStatus references(const char* function, Answer answer, const CMPIContext* ctx,
+    const CMPIResult* rslt, const CMPIObjectPath* op, const char* withoutTarget)
+{
+    const AssociationRequest request(module(), SensorSystemDeviceProvider, broker, function);
+    CMPIStatus status = {CMPI_RC_OK, nullptr};
+    SensorFactory factory(true, false);
+    std::vector<CMPIObjectPath*> farEnds;
+    farEnds.reserve(factory.getNumberOfInstances());
+    const CMPIObjectPath* const target = SensorFactory::get_assoc_targetClass_ObjectPath(
+        broker, op, SensorSystemDeviceClass, nullptr, &status);
+    if (!isUsable(target)) {
+        request.failWithoutTarget(withoutTarget, &status);
+        return status;
+    }
+    const CMPIObjectPath* const association = newPath(broker, op, SensorSystemDeviceClass, &status);
+    if (association != nullptr) {
+        if (const char* const failure = fetchFarEnds(ctx, op, target, factory, farEnds, &status))
+            request.marks().failure(failure);
+        else
+            returnAssociations(
+                answer, rslt, op, associate(association, op, target, farEnds, &status), &status);
+    }
+    request.marks().exit();
+    return status;
+}
+
+} // namespace
+
+CMPIStatus SensorSystemDevice_Associators(CMPIAssociationMI*, const CMPIContext* ctx,
+    const CMPIResult* rslt, const CMPIObjectPath* op, const char* assocClass,
+    const char* resultClass, const char*, const char*, const char** properties)
+{
+    return associators("SensorSystemDevice_Associators", Answer::instances, ctx, rslt, op,
+        assocClass, resultClass, properties);
+}
+
+CMPIStatus SensorSystemDevice_AssociatorNames(CMPIAssociationMI*, const CMPIContext* ctx,
+    const CMPIResult* rslt, const CMPIObjectPath* op, const char* assocClass,
+    const char* resultClass, const char*, const char*)
+{
+    return associators("SensorSystemDevice_AssociatorNames", Answer::paths, ctx, rslt, op,
+        assocClass, resultClass, nullptr);
+}
+
+CMPIStatus SensorSystemDevice_References(CMPIAssociationMI*, const CMPIContext* ctx,
+    const CMPIResult* rslt, const CMPIObjectPath* op, const char*, const char*, const char**)
+{
+    return references("SensorSystemDevice_References", Answer::instances, ctx, rslt, op,
+        "Object Path is NULL in References");
+}
+
+CMPIStatus SensorSystemDevice_ReferenceNames(CMPIAssociationMI*, const CMPIContext* ctx,
+    const CMPIResult* rslt, const CMPIObjectPath* op, const char*, const char*)
+{
+    return references("SensorSystemDevice_ReferenceNames", Answer::paths, ctx, rslt, op,
+        "Object Path is NULL in ReferenceNames");
+}
+
+} // namespace Vorn::SensorProfileProvider

@@ -1,0 +1,205 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// The instances of ZUMLO_SensorSystemDevice: each computer system with each sensor.
+
+#include "factory/ClassNames.h"
+#include "providers/AssociationRequests.h"
+#include "providers/SensorSystemDevice.h"
+
+#include <cstdint>
+
+namespace Vorn::SensorProfileProvider {
+
+using namespace SystemDevice;
+
+namespace {
+
+// What the factory answers a fetch of paths with.
+constexpr int NothingFound = 1;
+
+// How the failures of a walk over all pairs are reported. The runs of blanks are part of the
+// texts, and so are the classes they name.
+struct PairFailures {
+    FailureTexts system;
+    FailureTexts sensor;
+    FailureTexts association;
+};
+
+constexpr PairFailures InstanceFailures = {
+    {"Create CMPIObjectPath            failed.",
+        "Create CMPIObjectPath failed for             ComputerSystemClass.", nullptr},
+    {"CMPIObjectPath is NULL for Sensor Provider", "CMPIObjectPath is NULL for Sensor Provider",
+        nullptr},
+    {"Create CMPIObjectPath failed for HostedAccessPoint",
+        "Create CMPIObjectPath failed for                     HostedAccessPoint.", nullptr},
+};
+
+constexpr PairFailures NameFailures = {
+    {"Create CMPIObjectPath failed.", "Create CMPIObjectPath failed for ComputerSystemClass.",
+        nullptr},
+    {"CMPIObjectPath is NULL for Sensor", "CMPIObjectPath is NULL for Sensor Class", nullptr},
+    {"Create CMPIObjectPath failed                     for SensorSystemDeviceProvider.",
+        "Create CMPIObjectPath failed for                     SensorSystemDeviceClass.", nullptr},
+};
+
+// Where a walk ended.
+enum class WalkEnd { complete, withoutSystemPath, atUpcall, atSystem, atSensors, reported };
+
+// All pairs in order, system by system.
+class PairWalk {
+public:
+    PairWalk(const AssociationRequest& request, const PairFailures& failures,
+        const CMPIContext* ctx, const CMPIObjectPath* op, CMPIStatus* status)
+        : request_(request), failures_(failures), ctx_(ctx), op_(op), status_(status)
+    {
+    }
+
+    // Makes room for one object for each sensor.
+    template <typename Object>
+    void reserve(std::vector<Object*>& objects)
+    {
+        objects.reserve(factory_.getNumberOfInstances());
+    }
+
+    // Calls `visit` with the association's path, without keys, and its references.
+    template <typename Visit>
+    WalkEnd run(const Visit& visit)
+    {
+        const CMPIObjectPath* const systemClass = newSystemPath();
+        if (!isUsable(systemClass)) {
+            request_.fail(failures_.system, status_);
+            return WalkEnd::withoutSystemPath;
+        }
+        const CMPIEnumeration* const systems =
+            CBEnumInstanceNames(broker, ctx_, systemClass, status_);
+        if (status_->rc != CMPI_RC_OK)
+            return WalkEnd::atUpcall;
+        WalkEnd end = WalkEnd::complete;
+        const bool isWhole = forEachElement(systems, status_, [&](const CMPIData& element) {
+            if (const CMPIObjectPath* const system = pathOf(element))
+                end = walkSensors(system, visit);
+            return end == WalkEnd::complete;
+        });
+        return isWhole ? end : WalkEnd::atSystem;
+    }
+
+    // What the factory answered at the end of the walk.
+    int factoryResult() const { return result_; }
+
+private:
+    CMPIObjectPath* newSystemPath() const
+    {
+        const char* const nameSpace = nameSpaceOf(op_, status_);
+        if (nameSpace == nullptr || broker == nullptr)
+            return nullptr;
+        return CMNewObjectPath(broker, nameSpace, ComputerSystemClass, status_);
+    }
+
+    template <typename Visit>
+    WalkEnd walkSensors(const CMPIObjectPath* system, const Visit& visit)
+    {
+        std::vector<CMPIObjectPath*> sensors;
+        reserve(sensors);
+        result_ = factory_.getAllSensorCMPIObjPaths(broker, op_, sensors, status_);
+        if (result_ != 0)
+            return WalkEnd::atSensors;
+        const auto count = static_cast<std::uint16_t>(sensors.size());
+        for (std::uint16_t i = 0; i < count; ++i) {
+            const CMPIObjectPath* const sensor = sensors.at(i);
+            if (!isUsable(sensor))
+                return report(failures_.sensor);
+            copyNameSpace(sensor, op_, status_);
+            copyNameSpace(system, op_, status_);
+            CMPIObjectPath* const association =
+                newPath(broker, op_, SensorSystemDeviceClass, status_);
+            if (association == nullptr)
+                return report(failures_.association);
+            visit(association, References{{{"GroupComponent", system}, {"PartComponent", sensor}}});
+        }
+        return WalkEnd::complete;
+    }
+
+    WalkEnd report(const FailureTexts& texts)
+    {
+        request_.fail(texts, status_);
+        return WalkEnd::reported;
+    }
+
+    const AssociationRequest& request_;
+    const PairFailures& failures_;
+    const CMPIContext* ctx_;
+    const CMPIObjectPath* op_;
+    CMPIStatus* status_;
+    SensorFactory factory_{true, false};
+    int result_ = 0;
+};
+
+} // namespace
+
+int sensorSystemDeviceCMPIInstances(const CMPIObjectPath* op, const char** properties,
+    const CMPIContext* ctx, std::vector<CMPIInstance*>& out)
+{
+    const AssociationRequest request(
+        module(), SensorSystemDeviceProvider, broker, "sensorSystemDeviceCMPIInstances");
+    CMPIStatus status = {CMPI_RC_OK, nullptr};
+    PairWalk walk(request, InstanceFailures, ctx, op, &status);
+    walk.reserve(out);
+    const char* keys[] = {"GroupComponent", "PartComponent", nullptr};
+    const WalkEnd end =
+        walk.run([&](const CMPIObjectPath* association, const References& references) {
+            out.push_back(newAssociation(broker, association, references, properties, keys));
+        });
+    // The other ends leave without an exit mark.
+    if (end == WalkEnd::complete || end == WalkEnd::withoutSystemPath)
+        request.marks().exit();
+    return end == WalkEnd::complete ? 0 : 1;
+}
+
+CMPIStatus SensorSystemDevice_EnumInstanceNames(
+    CMPIInstanceMI*, const CMPIContext* ctx, const CMPIResult* rslt, const CMPIObjectPath* op)
+{
+    const AssociationRequest request(
+        module(), SensorSystemDeviceProvider, broker, "SensorSystemDevice_EnumInstanceNames");
+    CMPIStatus status = {CMPI_RC_OK, nullptr};
+    PairWalk walk(request, NameFailures, ctx, op, &status);
+    const WalkEnd end =
+        walk.run([&](const CMPIObjectPath* association, const References& references) {
+            addReferenceKeys(association, references);
+            CMReturnObjectPath(rslt, association);
+        });
+    if (end == WalkEnd::atUpcall) {
+        // Nobody serves computer systems, which is no failure of this provider.
+        CMSetStatusWithChars(
+            broker, &status, CMPI_RC_OK, "CBEnumInstanceNames Failed for the ZUMLO_ComputerSystem");
+        return status;
+    }
+    const bool isAnswered = end == WalkEnd::complete ||
+                            (end == WalkEnd::atSensors && walk.factoryResult() == NothingFound);
+    if (isAnswered || end == WalkEnd::withoutSystemPath)
+        request.marks().exit();
+    if (isAnswered)
+        CMReturnDone(rslt);
+    return status;
+}
+
+CMPIStatus SensorSystemDevice_EnumInstances(CMPIInstanceMI*, const CMPIContext* ctx,
+    const CMPIResult* rslt, const CMPIObjectPath* op, const char** properties)
+{
+    const AssociationRequest request(
+        module(), SensorSystemDeviceProvider, broker, "SensorSystemDevice_EnumInstances");
+    return request.enumerateInstances(rslt, [&](std::vector<CMPIInstance*>& instances) {
+        return sensorSystemDeviceCMPIInstances(op, properties, ctx, instances);
+    });
+}
+
+CMPIStatus SensorSystemDevice_GetInstance(CMPIInstanceMI*, const CMPIContext* ctx,
+    const CMPIResult* rslt, const CMPIObjectPath* op, const char** properties)
+{
+    const AssociationRequest request(
+        module(), SensorSystemDeviceProvider, broker, "SensorSystemDevice_GetInstance");
+    return request.getInstance(rslt, op, [&](std::vector<CMPIInstance*>& instances) {
+        return sensorSystemDeviceCMPIInstances(op, properties, ctx, instances);
+    });
+}
+
+} // namespace Vorn::SensorProfileProvider
