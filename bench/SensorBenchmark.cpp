@@ -2,6 +2,7 @@
 
 // What the requests of ZUMLO_NumericSensor cost, and where their time goes.
 
+#include "bench/Handle.h"
 #include "bench/ModelMachine.h"
 #include "factory/SensorFactory.h"
 #include "host/broker/Broker.h"
@@ -19,61 +20,43 @@
 namespace {
 
 using namespace Vorn::SensorProfileProvider;
+using Bench::handle;
 using Bench::ModelMachine;
+using Bench::NameSpace;
+using Bench::reportPerObject;
 
-constexpr const char* NameSpace = "root/cimv2";
 constexpr const char* Class = "ZUMLO_NumericSensor";
-
-void reportPerSensor(benchmark::State& state, std::int64_t sensors)
-{
-    state.counters["per_sensor"] = benchmark::Counter(static_cast<double>(sensors),
-        benchmark::Counter::kIsIterationInvariantRate | benchmark::Counter::kInvert);
-}
-
-// Runs a handler in a request of its own, and the request's end with it.
-template <typename Handler>
-void handle(benchmark::State& state, const Handler& handler)
-{
-    const ModelMachine machine(state.range(0));
-    const Host::Broker broker;
-    CMPIInstanceMI* const mi =
-        SensorProfileProvider_Create_InstanceMI(broker.handle(), nullptr, nullptr);
-    for (auto _ : state) {
-        Host::Request request(broker);
-        Host::CollectedResult answer;
-        Host::Result result(answer);
-        Host::ObjectPath& ref = request.makePath(NameSpace, Class);
-        handler(mi, request, result, ref);
-        benchmark::DoNotOptimize(answer.isDone());
-    }
-}
 
 void EnumInstanceNames(benchmark::State& state)
 {
-    handle(state, [](auto* mi, auto& request, auto& result, auto& ref) {
-        mi->ft->enumerateInstanceNames(
-            mi, request.context().handle(), result.handle(), ref.handle());
-    });
-    reportPerSensor(state, state.range(0));
+    handle(SensorProfileProvider_Create_InstanceMI, nullptr, Class, state,
+        [](auto* mi, auto& request, auto& result, auto& ref) {
+            mi->ft->enumerateInstanceNames(
+                mi, request.context().handle(), result.handle(), ref.handle());
+        });
+    reportPerObject(state, state.range(0));
 }
 
 void EnumInstances(benchmark::State& state)
 {
-    handle(state, [](auto* mi, auto& request, auto& result, auto& ref) {
-        mi->ft->enumerateInstances(
-            mi, request.context().handle(), result.handle(), ref.handle(), nullptr);
-    });
-    reportPerSensor(state, state.range(0));
+    handle(SensorProfileProvider_Create_InstanceMI, nullptr, Class, state,
+        [](auto* mi, auto& request, auto& result, auto& ref) {
+            mi->ft->enumerateInstances(
+                mi, request.context().handle(), result.handle(), ref.handle(), nullptr);
+        });
+    reportPerObject(state, state.range(0));
 }
 
 void GetInstance(benchmark::State& state)
 {
     const std::string deviceID = ModelMachine::someDeviceID(state.range(0));
-    handle(state, [&](auto* mi, auto& request, auto& result, auto& ref) {
-        ref.addKey("DeviceID", Host::Value::text(request.arena(), deviceID));
-        mi->ft->getInstance(mi, request.context().handle(), result.handle(), ref.handle(), nullptr);
-    });
-    reportPerSensor(state, state.range(0)); // it harvests all of them
+    handle(SensorProfileProvider_Create_InstanceMI, nullptr, Class, state,
+        [&](auto* mi, auto& request, auto& result, auto& ref) {
+            ref.addKey("DeviceID", Host::Value::text(request.arena(), deviceID));
+            mi->ft->getInstance(
+                mi, request.context().handle(), result.handle(), ref.handle(), nullptr);
+        });
+    reportPerObject(state, state.range(0)); // it harvests all of them
 }
 
 // ---- Where the time of EnumInstances goes ----
@@ -86,7 +69,7 @@ void Harvest(benchmark::State& state)
         getSensorInstances(sensors);
         benchmark::DoNotOptimize(sensors.data());
     }
-    reportPerSensor(state, state.range(0));
+    reportPerObject(state, state.range(0));
 }
 
 // Harvest and index: what a factory does before it is asked for anything.
@@ -97,7 +80,7 @@ void Records(benchmark::State& state)
         SensorFactory factory(true, false);
         benchmark::DoNotOptimize(&factory);
     }
-    reportPerSensor(state, state.range(0));
+    reportPerObject(state, state.range(0));
 }
 
 void Building(benchmark::State& state)
@@ -113,7 +96,7 @@ void Building(benchmark::State& state)
             request.makePath(NameSpace, Class).handle(), nullptr, false, instances, &status);
         benchmark::DoNotOptimize(instances.data());
     }
-    reportPerSensor(state, state.range(0));
+    reportPerObject(state, state.range(0));
 }
 
 // ---- One trace point ----
@@ -168,13 +151,3 @@ BENCHMARK(TracePointBelowLevel);
 BENCHMARK(TracePointWritten);
 
 } // namespace
-
-int main(int argc, char** argv)
-{
-    RynLog::configure({6000, "off", "off"});
-    benchmark::Initialize(&argc, argv);
-    if (benchmark::ReportUnrecognizedArguments(argc, argv))
-        return 1;
-    benchmark::RunSpecifiedBenchmarks();
-    return 0;
-}

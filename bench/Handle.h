@@ -1,0 +1,48 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// One request after another to a provider, each in a request of the embedded broker.
+
+#pragma once
+
+#include "bench/ModelMachine.h"
+#include "host/broker/Broker.h"
+#include "host/broker/CollectedResult.h"
+#include "host/broker/ObjectPath.h"
+#include "host/broker/Request.h"
+#include "host/broker/Result.h"
+
+#include <benchmark/benchmark.h>
+
+#include <cstdint>
+
+namespace Bench {
+
+inline constexpr const char* NameSpace = "root/cimv2";
+
+inline void reportPerObject(benchmark::State& state, std::int64_t objects)
+{
+    state.counters["per_object"] = benchmark::Counter(static_cast<double>(objects),
+        benchmark::Counter::kIsIterationInvariantRate | benchmark::Counter::kInvert);
+}
+
+// On a machine of as many sensors as the first range says. `create` is the provider's factory,
+// `upcalls` (null for none) what it finds behind the broker. The request's end is measured with
+// the request.
+template <typename Create, typename Handler>
+void handle(const Create& create, Host::BrokerUpcalls* upcalls, const char* className,
+    benchmark::State& state, const Handler& handler)
+{
+    const ModelMachine machine(state.range(0));
+    Host::Broker broker;
+    broker.setUpcalls(upcalls);
+    auto* const mi = create(broker.handle(), nullptr, nullptr);
+    for (auto _ : state) {
+        Host::Request request(broker);
+        Host::CollectedResult answer;
+        Host::Result result(answer);
+        handler(mi, request, result, request.makePath(NameSpace, className));
+        benchmark::DoNotOptimize(answer.isDone());
+    }
+}
+
+} // namespace Bench

@@ -1,0 +1,16 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "platform/logging/Configuration.h"
+
+#include <benchmark/benchmark.h>
+
+int main(int argc, char** argv)
+{
+    // Without the settings of the person who measures.
+    RynLog::configure({6000, "off", "off"});
+    benchmark::Initialize(&argc, argv);
+    if (benchmark::ReportUnrecognizedArguments(argc, argv))
+        return 1;
+    benchmark::RunSpecifiedBenchmarks();
+    return 0;
+}
