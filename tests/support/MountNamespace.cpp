@@ -149,6 +149,11 @@ BindMount::~BindMount()
     umount2(over_.c_str(), MNT_DETACH);
 }
 
+fs::path sysfsTree(const std::string& name)
+{
+    return fs::path(SENSOR_PROFILE_SOURCE_DIR) / "tests/data/sysfs" / name;
+}
+
 BoundSysfs::BoundSysfs(const fs::path& tree) : mount_(filled(copy_.path(), tree), "/sys/class") {}
 
 void BoundSysfs::write(const std::string& relative, const std::string& text)

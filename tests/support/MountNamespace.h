@@ -37,6 +37,9 @@ private:
     std::filesystem::path over_;
 };
 
+// A captured machine's tree among the test data, such as "server".
+std::filesystem::path sysfsTree(const std::string& name);
+
 // A private copy of a tree, bound over /sys/class. The tree holds `hwmon/hwmonN/...`, whose
 // `device` links lead to `../../devices/<address>`, where a `subsystem` link names the bus. An
 // empty path gives an empty tree.

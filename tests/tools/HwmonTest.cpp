@@ -107,7 +107,7 @@ class HwmonTest : public MountNamespaceTest, public testing::WithParamInterface<
 protected:
     static std::string tree()
     {
-        return std::string(SENSOR_PROFILE_SOURCE_DIR "/tests/data/sysfs/") + GetParam();
+        return Testing::sysfsTree(GetParam()).string();
     }
 };
 
@@ -154,7 +154,7 @@ TEST_F(HwmonAbsentTest, MachineWithoutChipsIsSaid)
 
 TEST_F(HwmonAbsentTest, SensorsConfigurationIsHonoured)
 {
-    const BoundSysfs sysfs(SENSOR_PROFILE_SOURCE_DIR "/tests/data/sysfs/desktop");
+    const BoundSysfs sysfs(Testing::sysfsTree("desktop"));
     const BoundSensorsConfiguration configuration(
         "chip \"nct6798-*\"\n  label fan1 \"Front fan\"\n  ignore fan2\n");
     const auto sensors = listedSensors();

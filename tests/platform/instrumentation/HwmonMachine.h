@@ -32,11 +32,6 @@ private:
     std::optional<BoundSensorsConfiguration> configuration_;
 };
 
-inline std::filesystem::path sysfsTree(const std::string& name)
-{
-    return std::filesystem::path(SENSOR_PROFILE_SOURCE_DIR) / "tests/data/sysfs" / name;
-}
-
 using Attributes = std::map<std::string, std::string>;
 
 // A machine with one chip, "testchip-isa-0290", that has these attributes.

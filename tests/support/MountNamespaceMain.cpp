@@ -1,5 +1,7 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
+// Runs tests inside a mount namespace of their own.
+
 #include "tests/support/MountNamespace.h"
 
 #include <gmock/gmock.h>

@@ -1,0 +1,106 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// Requests of many threads over hardware that changes under them.
+
+#include "host/broker/Array.h"
+#include "host/broker/Broker.h"
+#include "host/broker/CollectedResult.h"
+#include "host/broker/Instance.h"
+#include "host/broker/ObjectPath.h"
+#include "host/broker/Request.h"
+#include "host/broker/Result.h"
+#include "tests/providers/Factories.h"
+#include "tests/support/Environment.h"
+#include "tests/support/MountNamespace.h"
+
+#include <gmock/gmock.h>
+
+#include <atomic>
+#include <chrono>
+#include <map>
+#include <string>
+#include <thread>
+
+namespace {
+
+using Testing::BoundSysfs;
+
+constexpr const char* chip = "hwmon/hwmon1"; // the one that is unplugged
+constexpr const char* chipsSensor = "/hwmon/nvme-pci-0200/temp1";
+constexpr std::uint64_t lostCommunication = 13;
+
+class HwmonRequests : public Testing::MountNamespaceTest {
+protected:
+    // By device identifier.
+    std::map<std::string, std::int64_t> readings()
+    {
+        Host::Request request(broker_);
+        Host::CollectedResult answer;
+        Host::Result result(answer);
+        const CMPIStatus status =
+            mi_->ft->enumerateInstances(mi_, request.context().handle(), result.handle(),
+                request.makePath("root/cimv2", "ZUMLO_NumericSensor").handle(), nullptr);
+        EXPECT_EQ(status.rc, CMPI_RC_OK);
+        EXPECT_TRUE(answer.isDone());
+        std::map<std::string, std::int64_t> found;
+        for (const Host::Instance* const sensor : answer.instances())
+            if (!hasLostCommunication(*sensor))
+                found[std::string(*sensor->property("DeviceID")->text())] =
+                    *sensor->property("CurrentReading")->signedInteger();
+        return found;
+    }
+
+private:
+    static bool hasLostCommunication(const Host::Instance& sensor)
+    {
+        const auto states = sensor.property("OperationalStatus")->array()->elements();
+        return !states.empty() && states[0].unsignedInteger() == lostCommunication;
+    }
+
+    Testing::EnvironmentVariable hardware_{"VORN_INSTRUMENTATION", "hwmon"};
+    Host::Broker broker_;
+    CMPIInstanceMI* mi_ =
+        SensorProfileProvider_Create_InstanceMI(broker_.handle(), nullptr, nullptr);
+};
+
+TEST_F(HwmonRequests, eightThreadsEnumerateTrueReadingsWhileChipsComeAndGo)
+{
+    BoundSysfs sysfs(Testing::sysfsTree("hotplug"));
+    const auto whole = readings();
+    ASSERT_EQ(whole.size(), 3U);
+    std::atomic<bool> goOn{true};
+    std::atomic<unsigned> requests{0};
+    std::vector<std::jthread> clients;
+    for (int client = 0; client < 8; ++client)
+        clients.emplace_back([&] {
+            while (goOn) {
+                for (const auto& [device, reading] : readings())
+                    EXPECT_EQ(reading, whole.at(device)) << device;
+                ++requests;
+            }
+        });
+    const auto end = std::chrono::steady_clock::now() + std::chrono::seconds(3);
+    while (std::chrono::steady_clock::now() < end) {
+        sysfs.rename(chip, "unplugged");
+        std::this_thread::sleep_for(std::chrono::milliseconds(5));
+        sysfs.rename("unplugged", chip);
+        std::this_thread::sleep_for(std::chrono::milliseconds(5));
+    }
+    goOn = false;
+    clients.clear();
+    EXPECT_GT(requests, 8U);
+    EXPECT_EQ(readings(), whole);
+}
+
+TEST_F(HwmonRequests, aChipThatIsGoneIsNotInTheNextAnswer)
+{
+    BoundSysfs sysfs(Testing::sysfsTree("hotplug"));
+    ASSERT_EQ(readings().size(), 3U);
+    sysfs.rename(chip, "unplugged");
+    const auto rest = readings();
+    EXPECT_EQ(rest.size(), 2U);
+    for (const auto& [device, reading] : rest)
+        EXPECT_FALSE(device.ends_with(chipsSensor)) << device;
+}
+
+} // namespace
