@@ -1,0 +1,267 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// What lies at the far end of an association, for each end of each association and for what is
+// none.
+
+#include "factory/ClassNames.h"
+#include "factory/SensorFactory.h"
+#include "tests/support/FaultyBroker.h"
+#include "tests/support/ProviderTest.h"
+
+#include <gmock/gmock.h>
+
+namespace {
+
+using Vorn::SensorProfileProvider::SensorFactory;
+using namespace ::testing;
+using Testing::BrokerCall;
+using Testing::BrokerMessage;
+using Testing::FaultManner;
+using Testing::FaultyBroker;
+using Testing::LogCapture;
+using Testing::ProviderTest;
+
+constexpr const char* Sensor = "ZUMLO_NumericSensor";
+constexpr const char* System = "ZUMLO_ComputerSystem";
+constexpr const char* Capabilities = "ZUMLO_SensorEnabledLogicalElementCapabilities";
+constexpr const char* SystemDevice = "ZUMLO_SensorSystemDevice";
+constexpr const char* ElementCapabilities = "ZUMLO_SensorElementCapabilities";
+
+struct Row {
+    const char* name;
+    const char* source;
+    const char* association;
+    const char* target;
+    const char* component;
+    const char* text;
+    int exitLine;
+};
+
+const Row Rows[] = {
+    {"fromASystemToItsSensors", System, SystemDevice, Sensor, "SensorSystemDeviceProvider",
+        "Target Class is PhysicalPackageClass", 1205},
+    {"fromASensorToItsSystem", Sensor, SystemDevice, System, "SensorSystemDeviceProvider",
+        "Target Class is ComputerSystemClass", 1221},
+    {"fromASensorToItsCapabilities", Sensor, ElementCapabilities, Capabilities,
+        "SensorElementCapabilitiesProvider", "Target Class is PhysicalPackageClass", 1236},
+    {"fromCapabilitiesToTheirSensors", Capabilities, ElementCapabilities, Sensor,
+        "SensorElementCapabilitiesProvider", "Target Class is ComputerSystemClass", 1252},
+};
+
+class AssociationTargetTest : public ProviderTest {
+protected:
+    const char* nameFrom(
+        const char* source, const char* association, const char* resultClass = nullptr)
+    {
+        return SensorFactory::get_assoc_targetClass_Name(
+            broker(), path(source).handle(), association, resultClass, &rc_);
+    }
+
+    const Host::ObjectPath* pathFrom(
+        const char* source, const char* association, const char* resultClass = nullptr)
+    {
+        return Host::ObjectPath::of(SensorFactory::get_assoc_targetClass_ObjectPath(broker(),
+            path(source, {{"DeviceID", "x"}}, "root/other").handle(), association, resultClass,
+            &rc_));
+    }
+
+    void expectNoTarget(const char* source, const char* association)
+    {
+        EXPECT_EQ(nameFrom(source, association), nullptr) << source;
+        EXPECT_EQ(pathFrom(source, association), nullptr) << source;
+        EXPECT_TRUE(messages_.empty());
+        EXPECT_EQ(rc_.rc, CMPI_RC_OK);
+        EXPECT_EQ(rc_.msg, nullptr);
+    }
+
+    CMPIStatus rc_ = {CMPI_RC_OK, nullptr};
+};
+
+class AssociationRowTest : public AssociationTargetTest, public WithParamInterface<Row> {
+protected:
+    BrokerMessage message() const { return {1, GetParam().component, GetParam().text}; }
+};
+
+INSTANTIATE_TEST_SUITE_P(All, AssociationRowTest, ValuesIn(Rows),
+    [](const TestParamInfo<Row>& row) { return row.param.name; });
+
+// ---- The four ends ----
+
+TEST_P(AssociationRowTest, namesTheTargetAndTellsTheBroker)
+{
+    EXPECT_STREQ(nameFrom(GetParam().source, GetParam().association), GetParam().target);
+    EXPECT_EQ(rc_.rc, CMPI_RC_OK);
+    EXPECT_THAT(messages_, ElementsAre(message()));
+}
+
+TEST_P(AssociationRowTest, makesAKeylessPathInTheSourcesNamespaceOnThisSystem)
+{
+    const Host::ObjectPath* const target = pathFrom(GetParam().source, GetParam().association);
+    ASSERT_NE(target, nullptr);
+    EXPECT_EQ(target->className(), GetParam().target);
+    EXPECT_EQ(target->nameSpace(), "root/other");
+    EXPECT_EQ(target->host(), systemName_);
+    EXPECT_EQ(target->keys().size(), 0U);
+    EXPECT_EQ(rc_.rc, CMPI_RC_OK);
+    EXPECT_THAT(messages_, ElementsAre(message()));
+}
+
+TEST_P(AssociationRowTest, doesNotLookAtTheResultClass)
+{
+    for (const char* const resultClass : {"", "CIM_ComputerSystem", Sensor, "NOT_AClass"}) {
+        EXPECT_STREQ(
+            nameFrom(GetParam().source, GetParam().association, resultClass), GetParam().target);
+        EXPECT_NE(pathFrom(GetParam().source, GetParam().association, resultClass), nullptr);
+    }
+}
+
+TEST_P(AssociationRowTest, comparesLetterForLetter)
+{
+    const auto lower = [](std::string name) {
+        for (char& letter : name)
+            letter = static_cast<char>(std::tolower(static_cast<unsigned char>(letter)));
+        return name;
+    };
+    const Row& row = GetParam();
+    expectNoTarget(lower(row.source).c_str(), row.association);
+    expectNoTarget(row.source, lower(row.association).c_str());
+    expectNoTarget((row.source + std::string("2")).c_str(), row.association);
+    expectNoTarget(row.source, (row.association + std::string(" ")).c_str());
+}
+
+TEST_P(AssociationRowTest, withoutAnAssociationClassHasNoTarget)
+{
+    expectNoTarget(GetParam().source, nullptr);
+    expectNoTarget(GetParam().source, "");
+}
+
+std::string traced(
+    const std::string& function, const char* mark, int line, const std::string& parameters)
+{
+    const std::string number = std::to_string(line);
+    return function + "(SensorFactory:" + number + ") 3000 " + mark + ": " + function +
+           "() in SensorFactory [Line: " + number + "],Parameters List:  " + parameters;
+}
+
+TEST_P(AssociationRowTest, isTracedWithItsParameters)
+{
+    const LogCapture capture;
+    pathFrom(GetParam().source, GetParam().association, "Result");
+    const std::string parameters = std::string("broker=PTR ref=PTR _RefLeftClass=") +
+                                   GetParam().association + " _RefRightClass=Result rc=PTR";
+    const std::string name = "get_assoc_targetClass_Name";
+    const std::string objectPath = "get_assoc_targetClass_ObjectPath";
+    EXPECT_THAT(Testing::withoutPointers(capture.log()),
+        ElementsAre(traced(objectPath, "ENTERING", 1288, parameters),
+            traced(name, "ENTERING", 1185, parameters),
+            traced(name, "EXITING", GetParam().exitLine, parameters),
+            traced(objectPath, "EXITING", 1316, parameters)));
+}
+
+TEST_P(AssociationRowTest, aPathTheBrokerDoesNotMakeIsNoTarget)
+{
+    for (const FaultManner manner : {FaultManner::nullResult, FaultManner::handleless}) {
+        const LogCapture capture;
+        FaultyBroker faulty(broker_);
+        faulty.plan({BrokerCall::newObjectPath, 1, manner, CMPI_RC_ERR_INVALID_NAMESPACE});
+        EXPECT_EQ(SensorFactory::get_assoc_targetClass_ObjectPath(faulty.handle(),
+                      faulty.watch(path(GetParam().source).handle()), GetParam().association,
+                      nullptr, &rc_),
+            nullptr);
+        EXPECT_EQ(rc_.rc, CMPI_RC_ERR_INVALID_NAMESPACE); // as the broker left it
+        ASSERT_EQ(capture.log().size(), 4U);
+        EXPECT_EQ(capture.log().back().line, 1316U);
+    }
+}
+
+// ---- What is no end ----
+
+TEST_F(AssociationTargetTest, anotherProvidersEndHasNoTarget)
+{
+    expectNoTarget(System, ElementCapabilities);
+    expectNoTarget(Capabilities, SystemDevice);
+    expectNoTarget(SystemDevice, SystemDevice);
+    expectNoTarget(ElementCapabilities, ElementCapabilities);
+    expectNoTarget("CIM_NumericSensor", SystemDevice);
+    expectNoTarget("CIM_ComputerSystem", SystemDevice);
+    expectNoTarget(Sensor, "CIM_SystemDevice");
+    expectNoTarget(Sensor, Sensor);
+    expectNoTarget("OTHER_Class", ElementCapabilities);
+}
+
+TEST_F(AssociationTargetTest, noTargetLeavesTheTextOfTheStatusToTheCaller)
+{
+    // The broker's calls on the way succeed and say so; nothing else is written.
+    CMPIStatus* const none = nullptr;
+    EXPECT_EQ(SensorFactory::get_assoc_targetClass_Name(
+                  broker(), path(System).handle(), ElementCapabilities, nullptr, none),
+        nullptr);
+    EXPECT_STREQ(SensorFactory::get_assoc_targetClass_Name(
+                     broker(), path(System).handle(), SystemDevice, nullptr, none),
+        Sensor);
+}
+
+TEST_F(AssociationTargetTest, aSourceThatIsNoPathHasNoTarget)
+{
+    const CMPIObjectPath handleless = {nullptr, &Host::ObjectPath::functions};
+    for (const CMPIObjectPath* const source :
+        {static_cast<const CMPIObjectPath*>(nullptr), &handleless}) {
+        EXPECT_EQ(SensorFactory::get_assoc_targetClass_Name(
+                      broker(), source, SystemDevice, nullptr, &rc_),
+            nullptr);
+        EXPECT_EQ(SensorFactory::get_assoc_targetClass_ObjectPath(
+                      broker(), source, SystemDevice, nullptr, &rc_),
+            nullptr);
+    }
+    EXPECT_TRUE(messages_.empty());
+}
+
+TEST_F(AssociationTargetTest, aSourceWhoseClassIsNotToldHasNoTarget)
+{
+    for (const FaultManner manner : {FaultManner::nullResult, FaultManner::handleless}) {
+        FaultyBroker faulty(broker_);
+        faulty.plan({BrokerCall::getClassName, 1, manner});
+        EXPECT_EQ(SensorFactory::get_assoc_targetClass_Name(faulty.handle(),
+                      faulty.watch(path(Sensor).handle()), SystemDevice, nullptr, &rc_),
+            nullptr);
+        EXPECT_EQ(rc_.rc, CMPI_RC_ERR_FAILED);
+    }
+}
+
+TEST_F(AssociationTargetTest, aSourceWhoseNamespaceIsNotToldHasNoTargetPath)
+{
+    FaultyBroker faulty(broker_);
+    faulty.plan({BrokerCall::getNameSpace, 1, FaultManner::nullResult});
+    EXPECT_EQ(SensorFactory::get_assoc_targetClass_ObjectPath(faulty.handle(),
+                  faulty.watch(path(Sensor).handle()), SystemDevice, nullptr, &rc_),
+        nullptr);
+    EXPECT_EQ(rc_.rc, CMPI_RC_ERR_FAILED);
+}
+
+TEST_F(AssociationTargetTest, noTargetIsTracedWithItsOwnExitingLineAndAbsentNames)
+{
+    const LogCapture capture;
+    pathFrom("OTHER_Class", nullptr);
+    const std::string parameters =
+        "broker=PTR ref=PTR _RefLeftClass=(null) _RefRightClass=(null) rc=PTR";
+    const std::string name = "get_assoc_targetClass_Name";
+    const std::string objectPath = "get_assoc_targetClass_ObjectPath";
+    EXPECT_THAT(Testing::withoutPointers(capture.log()),
+        ElementsAre(traced(objectPath, "ENTERING", 1288, parameters),
+            traced(name, "ENTERING", 1185, parameters), traced(name, "EXITING", 1259, parameters),
+            traced(objectPath, "EXITING", 1316, parameters)));
+}
+
+// ---- Names ----
+
+TEST(ClassNames, areTheOnesOfTheSchema)
+{
+    using namespace Vorn::SensorProfileProvider;
+    EXPECT_STREQ(SensorClass, Sensor);
+    EXPECT_STREQ(ComputerSystemClass, System);
+    EXPECT_STREQ(SensorSystemDeviceClass, SystemDevice);
+    EXPECT_STREQ(SensorElementCapabilitiesClass, ElementCapabilities);
+    EXPECT_STREQ(SensorEnabledLogicalElementCapClass, Capabilities);
+}
+
+} // namespace

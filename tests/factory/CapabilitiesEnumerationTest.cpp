@@ -1,0 +1,310 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// The factory's capabilities as instances and object paths.
+
+#include "factory/SensorFactory.h"
+#include "tests/support/FaultyBroker.h"
+#include "tests/support/ProviderTest.h"
+
+#include <gmock/gmock.h>
+
+namespace {
+
+using namespace Vorn::SensorProfileProvider;
+using Testing::BrokerCall;
+using Testing::BrokerMessage;
+using Testing::describe;
+using ::testing::ElementsAre;
+using ::testing::ElementsAreArray;
+using Testing::FaultManner;
+using Testing::FaultyBroker;
+using Testing::LogCapture;
+using Testing::property;
+using Testing::ProviderTest;
+using Testing::ScriptedMachine;
+
+constexpr const char* Class = "ZUMLO_SensorEnabledLogicalElementCapabilities";
+constexpr const char* Provider = "SensorEnabledLogicalElementCapabilitiesProvider";
+constexpr const char* Identifier = "ZUMLO:SensorEnabledLogicalElementCap1";
+
+class CapabilitiesEnumerationTest : public ProviderTest {
+protected:
+    explicit CapabilitiesEnumerationTest(bool hasCapabilities = true)
+        : factory_(false, hasCapabilities)
+    {
+    }
+
+    int getAll(const char** properties = nullptr, bool isObjPath = false)
+    {
+        return factory_.getAllSensorEnabledLogicalElementCapCMPIInstances(
+            broker(), path("C").handle(), properties, isObjPath, instances_, &rc_);
+    }
+
+    int getOne(const char* identifier, const char** properties = nullptr)
+    {
+        return factory_.getOneSensorEnabledLogicalElementCapCMPIInstance(broker(),
+            path("C").handle(), Host::String::make(request_->arena(), identifier).handle(),
+            properties, instances_, &rc_);
+    }
+
+    int getPaths()
+    {
+        return factory_.getAllSensorEnabledLogicalElementCapCMPIObjPaths(
+            broker(), path("C", {}, "root/other").handle(), paths_, &rc_);
+    }
+
+    ScriptedMachine machine_;
+    SensorFactory factory_;
+    std::vector<CMPIInstance*> instances_;
+    std::vector<CMPIObjectPath*> paths_;
+    CMPIStatus rc_ = {CMPI_RC_OK, nullptr};
+};
+
+class NoCapabilitiesTest : public CapabilitiesEnumerationTest {
+protected:
+    NoCapabilitiesTest() : CapabilitiesEnumerationTest(false) {}
+};
+
+// ---- Instances ----
+
+TEST_F(CapabilitiesEnumerationTest, thereIsOneInstance)
+{
+    EXPECT_EQ(getAll(), 0);
+    ASSERT_EQ(instances_.size(), 1U);
+    EXPECT_EQ(Host::Instance::of(instances_[0])->properties().size(), 3U);
+    EXPECT_EQ(rc_.rc, CMPI_RC_OK);
+    EXPECT_TRUE(messages_.empty());
+}
+
+TEST_F(CapabilitiesEnumerationTest, theStatesDoNotGrowFromRequestToRequest)
+{
+    getAll();
+    getAll();
+    getOne(Identifier);
+    getPaths();
+    getAll();
+    ASSERT_EQ(instances_.size(), 4U);
+    for (const CMPIInstance* const instance : instances_)
+        EXPECT_EQ(property(*Host::Instance::of(instance), "RequestedStatesSupported"),
+            "[uint16 0, uint16 1, uint16 2]");
+}
+
+TEST_F(CapabilitiesEnumerationTest, theListAndTheObjectPathFlagReachTheInstance)
+{
+    const char* properties[] = {"ElementNameEditSupported", nullptr};
+    getAll(properties);
+    getAll(nullptr, true);
+    for (const CMPIInstance* const instance : instances_)
+        EXPECT_EQ(property(*Host::Instance::of(instance), "RequestedStatesSupported"), "absent");
+}
+
+TEST_F(CapabilitiesEnumerationTest, whatIsThereStaysInTheVector)
+{
+    instances_.push_back(nullptr);
+    getAll();
+    ASSERT_EQ(instances_.size(), 2U);
+    EXPECT_EQ(instances_[0], nullptr);
+}
+
+TEST_F(CapabilitiesEnumerationTest, anInstanceThatCannotBeMadeIsANullEntry)
+{
+    FaultyBroker faulty(broker_);
+    faulty.plan({BrokerCall::newInstance, 1, FaultManner::nullResult});
+    EXPECT_EQ(factory_.getAllSensorEnabledLogicalElementCapCMPIInstances(
+                  faulty.handle(), path("C").handle(), nullptr, false, instances_, &rc_),
+        0);
+    EXPECT_THAT(instances_, ElementsAre(nullptr));
+}
+
+TEST_F(NoCapabilitiesTest, haveNoInstancesAndThatIsNoFailure)
+{
+    EXPECT_EQ(getAll(), 0);
+    EXPECT_TRUE(instances_.empty());
+    EXPECT_TRUE(messages_.empty());
+}
+
+// ---- One instance ----
+
+TEST_F(CapabilitiesEnumerationTest, oneInstanceIsFoundByItsWholeIdentifier)
+{
+    EXPECT_EQ(getOne(Identifier), 0);
+    ASSERT_EQ(instances_.size(), 1U);
+    EXPECT_EQ(Host::Instance::of(instances_[0])->properties().size(), 3U);
+}
+
+TEST_F(CapabilitiesEnumerationTest, oneInstanceHasTheListedProperties)
+{
+    const char* properties[] = {"RequestedStatesSupported", nullptr};
+    EXPECT_EQ(getOne(Identifier, properties), 0);
+    EXPECT_EQ(Host::Instance::of(instances_.at(0))->properties().size(), 2U);
+}
+
+TEST_F(CapabilitiesEnumerationTest, anIdentifierIsNeitherFoldedNorTrimmed)
+{
+    const std::string identifier = Identifier;
+    for (const std::string& other : {std::string("zumlo:sensorenabledlogicalelementcap1"),
+             std::string("ZUMLO:SensorEnabledLogicalElementCAP1"), identifier + " ",
+             " " + identifier, identifier + "1", identifier.substr(0, identifier.size() - 1),
+             std::string("ZUMLO:SensorEnabledLogicalElementCap2"), std::string()})
+        EXPECT_EQ(getOne(other.c_str()), 1) << other;
+    EXPECT_TRUE(instances_.empty());
+    EXPECT_TRUE(messages_.empty());
+}
+
+TEST_F(CapabilitiesEnumerationTest, anUnknownIdentifierLeavesTheStatusAsItWas)
+{
+    rc_ = {CMPI_RC_ERR_ACCESS_DENIED, nullptr};
+    std::vector<CMPIInstance*> none;
+    EXPECT_EQ(factory_.getOneSensorEnabledLogicalElementCapCMPIInstance(
+                  broker(), path("C").handle(), nullptr, nullptr, none, &rc_),
+        1);
+    EXPECT_EQ(rc_.rc, CMPI_RC_ERR_ACCESS_DENIED);
+    EXPECT_TRUE(none.empty());
+}
+
+TEST_F(NoCapabilitiesTest, areNotFoundByTheirIdentifier)
+{
+    EXPECT_EQ(getOne(Identifier), 1);
+    EXPECT_TRUE(instances_.empty());
+}
+
+// ---- Object paths ----
+
+TEST_F(CapabilitiesEnumerationTest, anObjectPathHasItsOneKey)
+{
+    EXPECT_EQ(getPaths(), 0);
+    ASSERT_EQ(paths_.size(), 1U);
+    const Host::ObjectPath& only = *Host::ObjectPath::of(paths_[0]);
+    EXPECT_THAT(describe(only.keys()),
+        ElementsAre("InstanceID = string \"ZUMLO:SensorEnabledLogicalElementCap1\""));
+    EXPECT_EQ(only.className(), Class);
+    EXPECT_EQ(only.nameSpace(), "root/other");
+    EXPECT_EQ(only.host(), systemName_);
+    EXPECT_EQ(rc_.rc, CMPI_RC_OK);
+    EXPECT_TRUE(messages_.empty());
+}
+
+TEST_F(NoCapabilitiesTest, haveNoObjectPathsAndSayThatToTheBroker)
+{
+    rc_ = {CMPI_RC_ERR_ACCESS_DENIED, nullptr};
+    EXPECT_EQ(getPaths(), 1);
+    EXPECT_TRUE(paths_.empty());
+    EXPECT_EQ(rc_.rc, CMPI_RC_ERR_ACCESS_DENIED);
+    EXPECT_THAT(messages_, ElementsAre(BrokerMessage{2, Provider, "***No instance found***"}));
+}
+
+TEST_F(CapabilitiesEnumerationTest, anObjectPathThatCannotBeMadeEndsTheEnumeration)
+{
+    for (const FaultManner manner : {FaultManner::nullResult, FaultManner::handleless}) {
+        FaultyBroker faulty(broker_);
+        faulty.plan({BrokerCall::newObjectPath, 1, manner, CMPI_RC_OK});
+        messages_.clear();
+        EXPECT_EQ(factory_.getAllSensorEnabledLogicalElementCapCMPIObjPaths(
+                      faulty.handle(), path("C").handle(), paths_, &rc_),
+            2);
+        EXPECT_TRUE(paths_.empty());
+        EXPECT_EQ(rc_.rc, CMPI_RC_ERR_FAILED);
+        EXPECT_EQ(Testing::textOf(rc_.msg), "Create CMPIObjectPath failed");
+        EXPECT_THAT(messages_, ElementsAre(BrokerMessage{2, Provider,
+                                   "Create CMPIObjectPath failed for" + std::string(21, ' ') +
+                                       "SensorEnabledLogicalElementCapabilities class"}));
+    }
+}
+
+TEST_F(CapabilitiesEnumerationTest, withoutAStatusAMissingPathIsToldToTheTraceAlone)
+{
+    FaultyBroker faulty(broker_);
+    faulty.plan({BrokerCall::newObjectPath, 1, FaultManner::nullResult});
+    EXPECT_EQ(factory_.getAllSensorEnabledLogicalElementCapCMPIObjPaths(
+                  faulty.handle(), path("C").handle(), paths_, nullptr),
+        2);
+    EXPECT_EQ(messages_.size(), 1U);
+}
+
+// ---- Trace lines; those of the instances made on the way are left out ----
+
+std::vector<std::string> linesOf(const LogCapture& capture, const std::string& function)
+{
+    std::vector<std::string> found;
+    for (const Testing::LogLine& line : capture.log())
+        if (line.function == function)
+            found.push_back(Testing::withoutPointers(line));
+    return found;
+}
+
+std::string traced(
+    const std::string& function, const std::string& mark, int line, const std::string& parameters)
+{
+    const std::string number = std::to_string(line);
+    return function + "(SensorFactory:" + number + ") 3000 " + mark + ": " + function +
+           "() in SensorFactory [Line: " + number + "],Parameters List:  " + parameters;
+}
+
+TEST_F(CapabilitiesEnumerationTest, allInstancesAreTraced)
+{
+    const LogCapture capture;
+    getAll();
+    const std::string name = "getAllSensorEnabledLogicalElementCapCMPIInstances";
+    const std::string parameters =
+        "broker=PTR ref=PTR properties=0 isObjPath=0 instances=PTR rc=PTR";
+    EXPECT_THAT(linesOf(capture, name), ElementsAre(traced(name, "ENTERING", 996, parameters),
+                                            traced(name, "EXITING", 1017, parameters)));
+}
+
+TEST_F(CapabilitiesEnumerationTest, oneInstanceIsTracedAndItsBuilderDoesNotWantAPath)
+{
+    const LogCapture capture;
+    getOne(Identifier);
+    const std::string name = "getOneSensorEnabledLogicalElementCapCMPIInstance";
+    const std::string parameters = "broker=PTR ref=PTR key=PTR properties=0 instances=PTR rc=PTR";
+    EXPECT_THAT(linesOf(capture, name), ElementsAre(traced(name, "ENTERING", 1134, parameters),
+                                            traced(name, "EXITING", 1158, parameters)));
+    const std::vector<std::string> built =
+        linesOf(capture, "makeSensorEnabledLogicalElementCapInstance");
+    ASSERT_EQ(built.size(), 2U);
+    EXPECT_THAT(built[0], ::testing::HasSubstr(" IsObjPath=0 "));
+}
+
+TEST_F(CapabilitiesEnumerationTest, anUnknownIdentifierLeavesTheExitingLineOut)
+{
+    const LogCapture capture;
+    getOne("unknown");
+    const std::string name = "getOneSensorEnabledLogicalElementCapCMPIInstance";
+    EXPECT_THAT(linesOf(capture, name),
+        ElementsAre(traced(name, "ENTERING", 1134,
+            "broker=PTR ref=PTR key=PTR properties=0 instances=PTR rc=PTR")));
+}
+
+const std::string PathsOperation = "getAllSensorEnabledLogicalElementCapCMPIObjPaths";
+const std::string PathsParameters = "broker=PTR ref=PTR objectPaths=PTR status=PTR";
+
+TEST_F(CapabilitiesEnumerationTest, objectPathsAreTraced)
+{
+    const LogCapture capture;
+    getPaths();
+    EXPECT_THAT(linesOf(capture, PathsOperation),
+        ElementsAre(traced(PathsOperation, "ENTERING", 1041, PathsParameters),
+            traced(PathsOperation, "EXITING", 1093, PathsParameters)));
+}
+
+TEST_F(NoCapabilitiesTest, haveAnExitingLineOfTheirOwn)
+{
+    const LogCapture capture;
+    getPaths();
+    EXPECT_THAT(linesOf(capture, PathsOperation),
+        ElementsAre(traced(PathsOperation, "ENTERING", 1041, PathsParameters),
+            traced(PathsOperation, "EXITING", 1104, PathsParameters)));
+}
+
+TEST_F(CapabilitiesEnumerationTest, anObjectPathThatCannotBeMadeLeavesTheExitingLineOut)
+{
+    const LogCapture capture;
+    FaultyBroker faulty(broker_);
+    faulty.plan({BrokerCall::newObjectPath, 1, FaultManner::nullResult});
+    factory_.getAllSensorEnabledLogicalElementCapCMPIObjPaths(
+        faulty.handle(), path("C").handle(), paths_, &rc_);
+    EXPECT_THAT(linesOf(capture, PathsOperation),
+        ElementsAre(traced(PathsOperation, "ENTERING", 1041, PathsParameters)));
+}
+
+} // namespace

@@ -1,0 +1,241 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// From a capabilities record to an instance: which properties, of which types, with which values.
+
+#include "factory/SensorFactory.h"
+#include "tests/support/FaultyBroker.h"
+#include "tests/support/ProviderTest.h"
+
+#include <gmock/gmock.h>
+
+namespace {
+
+using namespace Vorn::SensorProfileProvider;
+using Testing::BrokerCall;
+using Testing::BrokerMessage;
+using Testing::describe;
+using ::testing::ElementsAre;
+using Testing::FaultManner;
+using Testing::FaultyBroker;
+using Testing::LogCapture;
+using Testing::namesOf;
+using Testing::property;
+using Testing::ProviderTest;
+
+constexpr const char* Class = "ZUMLO_SensorEnabledLogicalElementCapabilities";
+constexpr const char* Provider = "SensorEnabledLogicalElementCapabilitiesProvider";
+const std::string WideGap(25, ' ');
+
+class CapabilitiesInstanceBuilderTest : public ProviderTest {
+protected:
+    CMPIInstance* build(const char** properties = nullptr, bool isObjPath = false,
+        const SensorEnabledLogCap& record = {})
+    {
+        SensorFactory factory;
+        return factory.makeSensorEnabledLogicalElementCapInstance(
+            broker(), path("ANY_Class").handle(), record, properties, isObjPath, &rc_);
+    }
+
+    const Host::Instance& make(const char** properties = nullptr, bool isObjPath = false,
+        const SensorEnabledLogCap& record = {})
+    {
+        const Host::Instance* const instance =
+            Host::Instance::of(build(properties, isObjPath, record));
+        if (instance == nullptr)
+            throw std::runtime_error("no instance was made");
+        return *instance;
+    }
+
+    std::vector<std::string> namesWith(std::vector<const char*> properties, bool isObjPath = false)
+    {
+        properties.push_back(nullptr);
+        return namesOf(make(properties.data(), isObjPath).properties());
+    }
+
+    // One instance by a broker that fails; null or handle-less ones as they come.
+    CMPIInstance* buildWith(const Testing::Fault& fault, CMPIStatus* rc,
+        const char** properties = nullptr, bool isObjPath = false)
+    {
+        faulty_.reset();
+        faulty_ = std::make_unique<FaultyBroker>(broker_);
+        faulty_->plan(fault);
+        SensorFactory factory;
+        CMPIInstance* const made =
+            factory.makeSensorEnabledLogicalElementCapInstance(faulty_->handle(),
+                faulty_->watch(path("ANY_Class").handle()), {}, properties, isObjPath, rc);
+        EXPECT_EQ(faulty_->fired(), 1U);
+        return made;
+    }
+
+    std::unique_ptr<FaultyBroker> faulty_;
+    CMPIStatus rc_ = {CMPI_RC_OK, nullptr};
+};
+
+TEST_F(CapabilitiesInstanceBuilderTest, allPropertiesComeInOrder)
+{
+    EXPECT_THAT(describe(make().properties()),
+        ElementsAre("InstanceID = string \"ZUMLO:SensorEnabledLogicalElementCap1\"",
+            "RequestedStatesSupported = [uint16 0, uint16 1, uint16 2]",
+            "ElementNameEditSupported = false"));
+    EXPECT_EQ(rc_.rc, CMPI_RC_OK);
+    EXPECT_TRUE(messages_.empty());
+}
+
+TEST_F(CapabilitiesInstanceBuilderTest, theRecordIsReadAsACopy)
+{
+    const SensorEnabledLogCap record;
+    make(nullptr, false, record);
+    EXPECT_EQ(property(make(nullptr, false, record), "RequestedStatesSupported"),
+        "[uint16 0, uint16 1, uint16 2]");
+}
+
+TEST_F(CapabilitiesInstanceBuilderTest, aRecordThatWasReadBeforeCarriesItsStatesAgain)
+{
+    SensorEnabledLogCap record;
+    record.getStatesSupported();
+    EXPECT_EQ(property(make(nullptr, false, record), "RequestedStatesSupported"),
+        "[uint16 0, uint16 1, uint16 2, uint16 0, uint16 1, uint16 2]");
+}
+
+TEST_F(CapabilitiesInstanceBuilderTest, anObjectPathNeedsNoStates)
+{
+    EXPECT_THAT(namesOf(make(nullptr, true).properties()),
+        ElementsAre("InstanceID", "ElementNameEditSupported"));
+}
+
+TEST_F(CapabilitiesInstanceBuilderTest, aPropertyListDecidesWhateverTheObjectPathFlagSays)
+{
+    for (const bool isObjPath : {false, true})
+        EXPECT_THAT(namesWith({"RequestedStatesSupported", "ElementNameEditSupported"}, isObjPath),
+            ElementsAre("InstanceID", "RequestedStatesSupported", "ElementNameEditSupported"));
+}
+
+// The broker's filter holds the list as well, so what it does not name is dropped there.
+TEST_F(CapabilitiesInstanceBuilderTest, aListSelectsItsPropertiesAndTheKey)
+{
+    EXPECT_THAT(namesWith({"RequestedStatesSupported"}),
+        ElementsAre("InstanceID", "RequestedStatesSupported"));
+    EXPECT_THAT(namesWith({"ElementNameEditSupported"}),
+        ElementsAre("InstanceID", "ElementNameEditSupported"));
+    EXPECT_THAT(namesWith({"ElementName"}), ElementsAre("InstanceID"));
+    EXPECT_THAT(namesWith({}), ElementsAre("InstanceID"));
+}
+
+TEST_F(CapabilitiesInstanceBuilderTest, theEditFlagIsSetWhateverTheListNames)
+{
+    const char* lists[][2] = {{"ElementName", nullptr}, {nullptr, nullptr}};
+    for (const char** const list : lists) {
+        const CMPIInstance* const made =
+            buildWith({BrokerCall::setPropertyFilter, 1, FaultManner::errorStatus}, &rc_, list);
+        EXPECT_THAT(namesOf(Host::Instance::of(made)->properties()),
+            ElementsAre("InstanceID", "ElementNameEditSupported"));
+    }
+}
+
+TEST_F(CapabilitiesInstanceBuilderTest, aListIsReadToItsNullEntry)
+{
+    EXPECT_THAT(namesWith({"A", "B", "RequestedStatesSupported", "C"}),
+        ElementsAre("InstanceID", "RequestedStatesSupported"));
+    const char* list[] = {"A", nullptr, "RequestedStatesSupported", nullptr};
+    EXPECT_THAT(namesOf(make(list).properties()), ElementsAre("InstanceID"));
+}
+
+TEST_F(CapabilitiesInstanceBuilderTest, namesAreComparedLetterForLetter)
+{
+    for (const char* const name :
+        {"requestedstatessupported", "RequestedStatesSupported ", "RequestedStatesSupporte"})
+        EXPECT_THAT(namesWith({name}), ElementsAre("InstanceID")) << name;
+}
+
+TEST_F(CapabilitiesInstanceBuilderTest, thePathHasTheRequestsNamespaceAndThisSystemAsHost)
+{
+    SensorFactory factory;
+    const Host::Instance* const instance =
+        Host::Instance::of(factory.makeSensorEnabledLogicalElementCapInstance(
+            broker(), path("ANY_Class", {}, "root/other").handle(), {}, nullptr, false, &rc_));
+    ASSERT_NE(instance, nullptr);
+    const Host::ObjectPath& made = instance->objectPath();
+    EXPECT_EQ(made.nameSpace(), "root/other");
+    EXPECT_EQ(made.host(), systemName_);
+    EXPECT_EQ(made.className(), Class);
+    // The filter's key list names the key.
+    EXPECT_THAT(describe(made.keys()),
+        ElementsAre("InstanceID = string \"ZUMLO:SensorEnabledLogicalElementCap1\""));
+}
+
+// ---- Failures of the broker ----
+
+TEST_F(CapabilitiesInstanceBuilderTest, withoutAPathThereIsNoInstance)
+{
+    for (const FaultManner manner : {FaultManner::nullResult, FaultManner::handleless}) {
+        const LogCapture capture;
+        CMPIStatus rc = {CMPI_RC_OK, nullptr};
+        const Testing::Fault fault = {
+            BrokerCall::newObjectPath, 1, manner, CMPI_RC_ERR_INVALID_NAMESPACE};
+        EXPECT_EQ(buildWith(fault, &rc), nullptr);
+        EXPECT_EQ(rc.rc, CMPI_RC_ERR_INVALID_NAMESPACE); // as the broker left it
+        EXPECT_TRUE(messages_.empty());
+        EXPECT_EQ(capture.log().size(), 2U); // entering and exiting
+    }
+}
+
+TEST_F(CapabilitiesInstanceBuilderTest, anInstanceTheBrokerDoesNotMakeIsReturnedAsItCame)
+{
+    EXPECT_EQ(buildWith({BrokerCall::newInstance, 1, FaultManner::nullResult}, &rc_), nullptr);
+    EXPECT_EQ(rc_.rc, CMPI_RC_OK); // the broker is handed no status
+    const CMPIInstance* const made =
+        buildWith({BrokerCall::newInstance, 1, FaultManner::handleless}, &rc_);
+    ASSERT_NE(made, nullptr);
+    EXPECT_EQ(made->hdl, nullptr);
+    EXPECT_TRUE(messages_.empty());
+}
+
+TEST_F(CapabilitiesInstanceBuilderTest, anArrayThatCannotBeMadeIsReportedAndLeftOut)
+{
+    for (const FaultManner manner : {FaultManner::nullResult, FaultManner::handleless}) {
+        const LogCapture capture;
+        messages_.clear();
+        const CMPIInstance* const made =
+            buildWith({BrokerCall::newArray, 1, manner, CMPI_RC_OK}, &rc_);
+        EXPECT_THAT(namesOf(Host::Instance::of(made)->properties()),
+            ElementsAre("InstanceID", "ElementNameEditSupported"));
+        EXPECT_EQ(rc_.rc, CMPI_RC_ERR_FAILED);
+        EXPECT_EQ(Testing::textOf(rc_.msg),
+            "Creating array for Property" + WideGap + "RequestedStatesSupported failed.");
+        EXPECT_THAT(messages_,
+            ElementsAre(BrokerMessage{2, Provider,
+                "Creating Array for Property" + WideGap + "RequestedStatesSupported failed."}));
+        EXPECT_EQ(capture.log().size(), 2U); // entering and exiting
+    }
+}
+
+TEST_F(CapabilitiesInstanceBuilderTest, withoutAStatusAMissingArrayIsToldToTheTraceAlone)
+{
+    const CMPIInstance* const made =
+        buildWith({BrokerCall::newArray, 1, FaultManner::nullResult}, nullptr);
+    EXPECT_EQ(Host::Instance::of(made)->properties().size(), 2U);
+    EXPECT_EQ(messages_.size(), 1U);
+}
+
+TEST_F(CapabilitiesInstanceBuilderTest, isTracedWithItsParameters)
+{
+    const LogCapture capture;
+    make();
+    make(nullptr, true);
+    const auto lines = [](const std::string& flag) {
+        const std::string parameters = ",Parameters List:  broker=PTR ref=PTR snsrCap=PTR "
+                                       "properties=0 IsObjPath=" +
+                                       flag + " rc=PTR";
+        const std::string name = "makeSensorEnabledLogicalElementCapInstance";
+        return std::vector<std::string>{name + "(SensorFactory:863) 3000 ENTERING: " + name +
+                                            "() in SensorFactory [Line: 863]" + parameters,
+            name + "(SensorFactory:965) 3000 EXITING: " + name + "() in SensorFactory [Line: 965]" +
+                parameters};
+    };
+    std::vector<std::string> expected = lines("0");
+    for (const std::string& line : lines("1"))
+        expected.push_back(line);
+    EXPECT_EQ(Testing::withoutPointers(capture.log()), expected);
+}
+
+} // namespace
