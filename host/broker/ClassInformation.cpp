@@ -8,9 +8,17 @@
 
 namespace Host {
 
-void ClassTable::add(std::string className, std::vector<std::string> keys, std::string superclass)
+std::vector<ReferenceProperty> ClassInformation::referencesOf(
+    std::string_view, std::string_view) const
 {
-    classes_.push_back({std::move(className), std::move(keys), std::move(superclass)});
+    return {};
+}
+
+void ClassTable::add(std::string className, std::vector<std::string> keys, std::string superclass,
+    std::vector<ReferenceProperty> references)
+{
+    classes_.push_back(
+        {std::move(className), std::move(keys), std::move(superclass), std::move(references)});
 }
 
 const std::vector<std::string>* ClassTable::keysOf(
@@ -31,6 +39,13 @@ bool ClassTable::isDerivedFrom(
         current = find(current->superclass);
     }
     return false;
+}
+
+std::vector<ReferenceProperty> ClassTable::referencesOf(
+    std::string_view, std::string_view className) const
+{
+    const Class* const found = find(className);
+    return found == nullptr ? std::vector<ReferenceProperty>{} : found->references;
 }
 
 const ClassTable::Class* ClassTable::find(std::string_view className) const

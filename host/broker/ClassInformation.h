@@ -10,6 +10,12 @@
 
 namespace Host {
 
+// A property of an association class that refers to instances of a class, or of one below it.
+struct ReferenceProperty {
+    std::string name;
+    std::string className;
+};
+
 // Asked from any thread at any time, without locks: what it says does not change while the
 // broker uses it.
 class ClassInformation {
@@ -24,24 +30,33 @@ public:
     // Whether the class is derived from the other one, at any distance.
     virtual bool isDerivedFrom(std::string_view nameSpace, std::string_view className,
         std::string_view ancestor) const = 0;
+
+    // The reference properties of an association class, inherited ones included. None for any
+    // other class, for one that is not known, and for all where nothing is known of associations.
+    virtual std::vector<ReferenceProperty> referencesOf(
+        std::string_view nameSpace, std::string_view className) const;
 };
 
 // A table of classes, the same in every namespace.
 class ClassTable : public ClassInformation {
 public:
     // REQUIRES: no broker uses the table yet.
-    void add(std::string className, std::vector<std::string> keys, std::string superclass = {});
+    void add(std::string className, std::vector<std::string> keys, std::string superclass = {},
+        std::vector<ReferenceProperty> references = {});
 
     const std::vector<std::string>* keysOf(
         std::string_view nameSpace, std::string_view className) const override;
     bool isDerivedFrom(std::string_view nameSpace, std::string_view className,
         std::string_view ancestor) const override;
+    std::vector<ReferenceProperty> referencesOf(
+        std::string_view nameSpace, std::string_view className) const override;
 
 private:
     struct Class {
         std::string name;
         std::vector<std::string> keys;
         std::string superclass;
+        std::vector<ReferenceProperty> references;
     };
 
     const Class* find(std::string_view className) const;

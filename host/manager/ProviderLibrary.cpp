@@ -111,13 +111,19 @@ bool ProviderLibrary::cleanUp() noexcept
     }
 }
 
+std::string messageOf(const CMPIStatus& status)
+{
+    if (status.msg == nullptr || status.msg->hdl == nullptr)
+        return {};
+    const char* const message = status.msg->ft->getCharPtr(status.msg, nullptr);
+    return message == nullptr ? "" : message;
+}
+
 std::string describe(const CMPIStatus& status)
 {
-    std::string text = "code " + std::to_string(status.rc);
-    if (status.msg == nullptr || status.msg->hdl == nullptr)
-        return text;
-    const char* const message = status.msg->ft->getCharPtr(status.msg, nullptr);
-    return message == nullptr || *message == '\0' ? text : text + ": " + message;
+    const std::string code = "code " + std::to_string(status.rc);
+    const std::string message = messageOf(status);
+    return message.empty() ? code : code + ": " + message;
 }
 
 } // namespace Host

@@ -51,6 +51,9 @@ private:
     std::map<std::string, CMPIAssociationMI*> associationMIs_;
 };
 
+// The message of a status; empty when there is none.
+std::string messageOf(const CMPIStatus& status);
+
 // The code and message of a status, for people: "code 1: At least one key should be passed".
 std::string describe(const CMPIStatus& status);
 

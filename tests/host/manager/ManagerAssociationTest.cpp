@@ -1,0 +1,195 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// Operations that follow associations.
+
+#include "tests/host/manager/ManagerTest.h"
+
+namespace {
+
+using ::testing::ElementsAre;
+using ::testing::IsEmpty;
+using Testing::orNone;
+using Testing::ProviderCall;
+using Testing::refusalOf;
+using ::testing::StartsWith;
+
+using Association = Host::Manager::Association;
+
+constexpr CMPIStatus Ok = {CMPI_RC_OK, nullptr};
+
+class ManagerAssociationTest : public Testing::ManagerTest {
+protected:
+    ManagerAssociationTest()
+    {
+        for (const char* const name : {"BoxLinks", "ThingLinks"})
+            script(name, [this](const ProviderCall& call) {
+                arguments_.push_back(orNone(call.associationClass) + " " +
+                                     orNone(call.resultClass) + " " + orNone(call.role) + " " +
+                                     orNone(call.resultRole));
+                return deliver(call, "Part", "one");
+            });
+    }
+
+    // What the association providers are asked with.
+    const std::vector<std::string>& asked(const char* source, const Association& association)
+    {
+        arguments_.clear();
+        manager_.associatorNames(context(), path(source), association, answer_);
+        return arguments_;
+    }
+
+    std::vector<std::string> arguments_;
+};
+
+TEST_F(ManagerAssociationTest, withoutAssociationClassEachIsAskedByItsOwnName)
+{
+    EXPECT_THAT(asked("Box", {}), ElementsAre("BoxLink - - -", "ThingLink - - -"));
+    EXPECT_EQ(answer_.paths().size(), 2U);
+    EXPECT_TRUE(answer_.isDone());
+}
+
+TEST_F(ManagerAssociationTest, aSuperclassOfAssociationsAsksEachByItsOwnName)
+{
+    EXPECT_THAT(asked("Box", {.associationClass = "Link"}),
+        ElementsAre("BoxLink - - -", "ThingLink - - -"));
+}
+
+TEST_F(ManagerAssociationTest, aNamedAssociationClassIsAskedAlone)
+{
+    EXPECT_THAT(asked("Box", {.associationClass = "boxlink"}), ElementsAre("BoxLink - - -"));
+}
+
+TEST_F(ManagerAssociationTest, anUnrelatedAssociationClassIsAnEmptyAnswer)
+{
+    EXPECT_THAT(asked("Box", {.associationClass = "Part"}), IsEmpty());
+    EXPECT_TRUE(answer_.paths().empty());
+    EXPECT_TRUE(answer_.isDone());
+}
+
+TEST_F(ManagerAssociationTest, unknownClassesAreInvalid)
+{
+    EXPECT_EQ(refusalOf([&] { asked("Unheard", {}); }),
+        "code 5: there is no class Unheard in root/cimv2");
+    EXPECT_THAT(
+        refusalOf([&] { asked("Box", {.associationClass = "Nolink"}); }), StartsWith("code 5"));
+    EXPECT_THAT(refusalOf([&] { asked("Box", {.resultClass = "Nothing"}); }), StartsWith("code 5"));
+}
+
+TEST_F(ManagerAssociationTest, aSourceBelowTheReferencedClassCounts)
+{
+    EXPECT_THAT(asked("SpecialPart", {}), ElementsAre("BoxLink - - -", "ThingLink - - -"));
+    EXPECT_THAT(asked("Idle", {}), ElementsAre("ThingLink - - -"));
+}
+
+TEST_F(ManagerAssociationTest, aSourceAboveTheReferencedClassDoesNot)
+{
+    EXPECT_THAT(asked("Thing", {.associationClass = "BoxLink"}), IsEmpty());
+}
+
+TEST_F(ManagerAssociationTest, rolesThatAreNotTheSourcesExcludeAnAssociation)
+{
+    EXPECT_THAT(asked("Box", {.associationClass = "BoxLink", .role = "whole"}),
+        ElementsAre("BoxLink - whole -"));
+    EXPECT_THAT(asked("Box", {.associationClass = "BoxLink", .role = "Piece"}), IsEmpty());
+    EXPECT_THAT(asked("Box", {.role = "Other"}), IsEmpty());
+}
+
+TEST_F(ManagerAssociationTest, resultRolesThatAreNotAtTheOtherEndExcludeAnAssociation)
+{
+    EXPECT_THAT(asked("Box", {.associationClass = "BoxLink", .resultRole = "PIECE"}),
+        ElementsAre("BoxLink - - PIECE"));
+    EXPECT_THAT(asked("Part", {.associationClass = "BoxLink", .resultRole = "Piece"}), IsEmpty());
+    EXPECT_THAT(asked("Box", {.resultRole = "Other"}), IsEmpty());
+}
+
+TEST_F(ManagerAssociationTest, resultClassesThatCannotBeReachedExcludeAnAssociation)
+{
+    EXPECT_THAT(asked("Box", {.resultClass = "Idle"}), ElementsAre("ThingLink Idle - -"));
+    EXPECT_THAT(asked("Box", {.associationClass = "BoxLink", .resultClass = "SpecialPart"}),
+        ElementsAre("BoxLink SpecialPart - -")); // a Part may be one
+    EXPECT_THAT(asked("Box", {.associationClass = "BoxLink", .resultClass = "Thing"}),
+        ElementsAre("BoxLink - - -")); // all that it leads to is a Thing
+}
+
+TEST_F(ManagerAssociationTest, theSourceKeepsItsKeysAndHasItsClassesRegisteredName)
+{
+    std::vector<std::string> seen;
+    script("BoxLinks", [&](const ProviderCall& call) {
+        seen.push_back(Host::ObjectPath::of(call.path)->toText());
+        return Ok;
+    });
+    Host::ObjectPath& box = path("bOx");
+    box.addKey("Name", Host::Value::text(request_->arena(), "b"));
+    const Association association = {.associationClass = "BoxLink"};
+    manager_.associators(context(), box, association, nullptr, answer_);
+    manager_.associatorNames(context(), box, association, answer_);
+    manager_.references(context(), box, association, nullptr, answer_);
+    manager_.referenceNames(context(), box, association, answer_);
+    EXPECT_THAT(
+        seen, testing::AllOf(testing::SizeIs(4), testing::Each("root/cimv2:Box.Name=\"b\"")));
+}
+
+TEST_F(ManagerAssociationTest, resultsAreOfTheResultClassOrBelowIt)
+{
+    script("BoxLinks", [this](const ProviderCall& call) {
+        for (const char* const each : {"Part", "SpecialPart", "Box", "Unheard"})
+            deliver(call, each, "one");
+        return Ok;
+    });
+    const auto found = [&](const char* resultClass, bool asNames) {
+        Host::CollectedResult answer;
+        const Association association = {"BoxLink", resultClass, nullptr, nullptr};
+        if (asNames)
+            manager_.associatorNames(context(), path("Box"), association, answer);
+        else
+            manager_.associators(context(), path("Box"), association, nullptr, answer);
+        return delivered(answer);
+    };
+    for (const bool asNames : {false, true}) {
+        EXPECT_THAT(found("Part", asNames), ElementsAre("Part", "SpecialPart"));
+        EXPECT_THAT(found("specialpart", asNames), ElementsAre("SpecialPart"));
+        EXPECT_THAT(found("Thing", asNames), ElementsAre("Part", "SpecialPart", "Box"));
+        EXPECT_EQ(found(nullptr, asNames).size(), 4U);
+    }
+}
+
+TEST_F(ManagerAssociationTest, referencesGoByTheAssociationClassAsResultClass)
+{
+    for (const auto& [provider, className] :
+        {std::pair{"BoxLinks", "BoxLink"}, std::pair{"ThingLinks", "Idle"}})
+        script(provider, [this, className = className](const ProviderCall& call) {
+            arguments_.push_back(orNone(call.resultClass) + " " + orNone(call.role));
+            return deliver(call, className, "one");
+        });
+    manager_.references(
+        context(), path("Box"), {.resultClass = "Link", .role = "Whole"}, nullptr, answer_);
+    EXPECT_THAT(arguments_, ElementsAre("BoxLink Whole", "ThingLink Whole"));
+    EXPECT_THAT(delivered(answer_), ElementsAre("BoxLink")); // what is no Link is left out
+    arguments_.clear();
+    manager_.referenceNames(context(), path("Part"), {.resultClass = "BoxLink"}, answer_);
+    EXPECT_THAT(arguments_, ElementsAre("BoxLink -"));
+    manager_.references(context(), path("Part"), {.role = "Whole"}, nullptr, answer_);
+    EXPECT_THAT(arguments_, ElementsAre("BoxLink -"));
+}
+
+TEST_F(ManagerAssociationTest, anAnswerOutlivesTheFailureOfAnotherProvider)
+{
+    script("BoxLinks", [&](const ProviderCall& call) {
+        deliver(call, "Part", "of a failed answer");
+        return failure(CMPI_RC_ERR_FAILED, "broken");
+    });
+    manager_.associators(context(), path("Box"), {}, nullptr, answer_);
+    ASSERT_EQ(answer_.instances().size(), 1U);
+    EXPECT_EQ(answer_.instances()[0]->property("Name")->text(), "one");
+}
+
+TEST_F(ManagerAssociationTest, aFailureWithoutAnyAnswerIsPassedOn)
+{
+    script("ThingLinks", [](const ProviderCall&) { return Ok; });
+    script("BoxLinks", [&](const ProviderCall&) { return failure(CMPI_RC_ERR_FAILED, "broken"); });
+    EXPECT_EQ(refusalOf([&] { manager_.references(context(), path("Box"), {}, nullptr, answer_); }),
+        "code 1: broken");
+    EXPECT_FALSE(answer_.isDone());
+}
+
+} // namespace

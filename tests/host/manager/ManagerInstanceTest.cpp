@@ -1,0 +1,218 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// Operations on the instances of a class.
+
+#include "tests/host/manager/ManagerTest.h"
+
+namespace {
+
+using ::testing::ElementsAre;
+using ::testing::HasSubstr;
+using ::testing::IsEmpty;
+using Testing::ProviderCall;
+using Testing::refusalOf;
+using ::testing::StartsWith;
+
+constexpr CMPIStatus Ok = {CMPI_RC_OK, nullptr};
+
+using ManagerInstanceTest = Testing::ManagerTest;
+
+TEST_F(ManagerInstanceTest, aClassGoesToItsProvider)
+{
+    manager_.enumerateInstances(context(), path("Box"), nullptr, answer_);
+    manager_.enumerateInstanceNames(context(), path("Box"), answer_);
+    EXPECT_THAT(
+        calls_, ElementsAre("Boxes enumerateInstances Box", "Boxes enumerateInstanceNames Box"));
+    EXPECT_EQ(answer_.instances().size(), 1U);
+    EXPECT_EQ(answer_.paths().size(), 1U);
+}
+
+TEST_F(ManagerInstanceTest, aProviderGetsTheNameOfItsClassAsItIsRegistered)
+{
+    manager_.enumerateInstances(context(), path("bOX"), nullptr, answer_);
+    EXPECT_THAT(calls_, ElementsAre("Boxes enumerateInstances Box"));
+}
+
+TEST_F(ManagerInstanceTest, aSuperclassReachesEveryServedClassBelowIt)
+{
+    manager_.enumerateInstances(context(), path("Thing"), nullptr, answer_);
+    EXPECT_THAT(delivered(answer_), ElementsAre("Box", "Part", "SpecialPart"));
+    EXPECT_TRUE(answer_.isDone());
+}
+
+TEST_F(ManagerInstanceTest, aServedClassBringsItsSubclassesAlong)
+{
+    manager_.enumerateInstanceNames(context(), path("Part"), answer_);
+    EXPECT_THAT(delivered(answer_), ElementsAre("Part", "SpecialPart"));
+}
+
+TEST_F(ManagerInstanceTest, aMissingEndOfAProvidersResultIsSupplied)
+{
+    manager_.enumerateInstances(context(), path("Box"), nullptr, answer_);
+    EXPECT_TRUE(answer_.isDone());
+}
+
+TEST_F(ManagerInstanceTest, anUnknownClassIsInvalid)
+{
+    const std::string expected = "code 5: there is no class Unheard in root/cimv2";
+    EXPECT_EQ(refusalOf([&] {
+        manager_.enumerateInstances(context(), path("Unheard"), nullptr, answer_);
+    }),
+        expected);
+    EXPECT_EQ(
+        refusalOf([&] { manager_.getInstance(context(), path("Unheard"), nullptr); }), expected);
+    EXPECT_FALSE(answer_.isDone());
+}
+
+TEST_F(ManagerInstanceTest, aClassWithoutProviderIsNotSupported)
+{
+    const std::string expected = "code 7: no provider serves the class Idle";
+    EXPECT_EQ(refusalOf([&] { manager_.enumerateInstanceNames(context(), path("Idle"), answer_); }),
+        expected);
+    EXPECT_EQ(refusalOf([&] { manager_.getInstance(context(), path("Idle"), nullptr); }), expected);
+}
+
+TEST_F(ManagerInstanceTest, anInstanceIsOfItsOwnClassOnly)
+{
+    EXPECT_EQ(manager_.getInstance(context(), path("Part"), nullptr).className(), "Part");
+    EXPECT_THAT(calls_, ElementsAre("Parts getInstance Part"));
+    EXPECT_THAT(refusalOf([&] { manager_.getInstance(context(), path("Thing"), nullptr); }),
+        StartsWith("code 7"));
+}
+
+TEST_F(ManagerInstanceTest, anAnswerWithoutInstanceIsNotFound)
+{
+    script("Boxes", [](const ProviderCall&) { return Ok; });
+    EXPECT_EQ(refusalOf([&] { manager_.getInstance(context(), path("Box"), nullptr); }),
+        "code 6: there is no root/cimv2:Box");
+}
+
+TEST_F(ManagerInstanceTest, theArgumentsArriveAsTheyAre)
+{
+    const char* properties[] = {"Name", nullptr};
+    script("Boxes", [&](const ProviderCall& call) {
+        EXPECT_EQ(call.context, context().handle());
+        EXPECT_EQ(call.properties, properties);
+        EXPECT_EQ(Host::ObjectPath::of(call.path)->key("Name")->text(), "a box");
+        return answer(call);
+    });
+    Host::ObjectPath& box = path("Box");
+    box.addKey("Name", Host::Value::text(request_->arena(), "a box"));
+    manager_.getInstance(context(), box, properties);
+}
+
+TEST_F(ManagerInstanceTest, aProviderMayChangeItsPathWithoutChangingTheCallers)
+{
+    script("Boxes", [&](const ProviderCall& call) {
+        CMSetNameSpace(call.path, "elsewhere");
+        return answer(call);
+    });
+    const Host::ObjectPath& box = path("Box");
+    manager_.getInstance(context(), box, nullptr);
+    EXPECT_EQ(box.nameSpace(), Testing::NameSpace);
+}
+
+TEST_F(ManagerInstanceTest, aProvidersErrorIsPassedOn)
+{
+    script("Boxes", [&](const ProviderCall& call) {
+        answer(call);
+        return failure(CMPI_RC_ERR_ACCESS_DENIED, "not today");
+    });
+    EXPECT_EQ(
+        refusalOf([&] { manager_.enumerateInstances(context(), path("Box"), nullptr, answer_); }),
+        "code 2: not today");
+    EXPECT_FALSE(answer_.isDone());
+}
+
+TEST_F(ManagerInstanceTest, anErrorWithoutMessageNamesTheProvider)
+{
+    script("Boxes", [](const ProviderCall&) { return CMPIStatus{CMPI_RC_ERR_FAILED, nullptr}; });
+    EXPECT_EQ(refusalOf([&] { manager_.getInstance(context(), path("Box"), nullptr); }),
+        "code 1: Boxes answers code 1");
+}
+
+TEST_F(ManagerInstanceTest, anExceptionOfAProviderIsAFailure)
+{
+    script("Boxes",
+        [](const ProviderCall&) -> CMPIStatus { throw std::runtime_error("out of boxes"); });
+    EXPECT_EQ(refusalOf([&] { manager_.getInstance(context(), path("Box"), nullptr); }),
+        "code 1: Boxes: out of boxes");
+}
+
+TEST_F(ManagerInstanceTest, aProviderThatCannotBeHadIsAFailure)
+{
+    providers_.erase("Boxes");
+    EXPECT_EQ(refusalOf([&] { manager_.getInstance(context(), path("Box"), nullptr); }),
+        "code 1: no provider Boxes");
+}
+
+TEST_F(ManagerInstanceTest, whatIsNoObjectIsRefusedAndCounted)
+{
+    script("Boxes", [](const ProviderCall& call) {
+        EXPECT_NE(CMReturnInstance(call.result, nullptr).rc, CMPI_RC_OK);
+        return Ok;
+    });
+    manager_.enumerateInstances(context(), path("Box"), nullptr, answer_);
+    EXPECT_EQ(answer_.refused(), 1U);
+}
+
+TEST_F(ManagerInstanceTest, writingGoesToTheProviderWhoseAnswerComesBack)
+{
+    script("Boxes", [&](const ProviderCall&) { return failure(CMPI_RC_ERR_NOT_SUPPORTED, "no"); });
+    Host::Instance& box = request_->makeInstance(path("Box"));
+    EXPECT_EQ(
+        refusalOf([&] { manager_.createInstance(context(), path("Box"), box); }), "code 7: no");
+    EXPECT_EQ(refusalOf([&] { manager_.modifyInstance(context(), path("Box"), box, nullptr); }),
+        "code 7: no");
+    EXPECT_EQ(refusalOf([&] { manager_.deleteInstance(context(), path("Box")); }), "code 7: no");
+    EXPECT_THAT(calls_, ElementsAre("Boxes createInstance Box", "Boxes modifyInstance Box",
+                            "Boxes deleteInstance Box"));
+}
+
+TEST_F(ManagerInstanceTest, aCreatedInstancesPathComesBack)
+{
+    script("Boxes", [&](const ProviderCall& call) {
+        return CMReturnObjectPath(
+            call.result, CMNewObjectPath(broker(), Testing::NameSpace, "Box", nullptr));
+    });
+    Host::Instance& box = request_->makeInstance(path("Box"));
+    EXPECT_EQ(manager_.createInstance(context(), path("Box"), box).toText(), "root/cimv2:Box");
+    script("Boxes", [](const ProviderCall&) { return Ok; });
+    EXPECT_THAT(refusalOf([&] { manager_.createInstance(context(), path("Box"), box); }),
+        HasSubstr("Boxes does not say what it made"));
+}
+
+TEST_F(ManagerInstanceTest, aFunctionThatAProviderLeavesOutIsNotSupported)
+{
+    EXPECT_EQ(refusalOf([&] {
+        manager_.execQuery(context(), path("Box"), "SELECT * FROM Box", "WQL", answer_);
+    }),
+        "code 7: Boxes does not offer this operation");
+    EXPECT_THAT(calls_, IsEmpty());
+}
+
+// ---- Several providers ----
+
+TEST_F(ManagerInstanceTest, whatOneProviderFailsToAnswerTakesNothingFromTheOthers)
+{
+    script("Boxes", [&](const ProviderCall& call) {
+        answer(call);
+        return failure(CMPI_RC_ERR_FAILED, "broken");
+    });
+    manager_.enumerateInstances(context(), path("Thing"), nullptr, answer_);
+    EXPECT_THAT(delivered(answer_), ElementsAre("Part", "SpecialPart"));
+    EXPECT_TRUE(answer_.isDone());
+}
+
+TEST_F(ManagerInstanceTest, whereNothingAtAllIsFoundTheFirstFailureIsTheAnswer)
+{
+    script("Boxes", [](const ProviderCall&) { return Ok; });
+    script("Parts", [&](const ProviderCall&) { return failure(CMPI_RC_ERR_FAILED, "first"); });
+    script(
+        "SpecialParts", [&](const ProviderCall&) { return failure(CMPI_RC_ERR_FAILED, "second"); });
+    EXPECT_EQ(
+        refusalOf([&] { manager_.enumerateInstances(context(), path("Thing"), nullptr, answer_); }),
+        "code 1: first");
+}
+
+} // namespace

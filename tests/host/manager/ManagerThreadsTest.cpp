@@ -1,0 +1,95 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// Many requests at once.
+
+#include "tests/host/manager/ManagerTest.h"
+#include "tests/host/manager/OddProvider.h"
+
+#include <dlfcn.h>
+
+#include <atomic>
+#include <thread>
+
+namespace {
+
+using Testing::ProviderCall;
+
+constexpr int threadCount = 8;
+constexpr CMPIStatus Ok = {CMPI_RC_OK, nullptr};
+
+void onThreads(const std::function<void()>& work)
+{
+    std::vector<std::thread> threads;
+    for (int i = 0; i < threadCount; ++i)
+        threads.emplace_back(work);
+    for (std::thread& thread : threads)
+        thread.join();
+}
+
+// Its own fixture: the others' note their calls, which is for one thread.
+class ManagerThreadsTest : public Testing::ManagerTest {
+protected:
+    ManagerThreadsTest()
+    {
+        request_.reset();
+        providers_["Parts"].handle([this](const ProviderCall& call) { return answer(call); });
+        providers_["SpecialParts"].handle(
+            [this](const ProviderCall& call) { return answer(call); });
+        providers_["Boxes"].handle([this](const ProviderCall& call) {
+            CMPIStatus status = Ok;
+            const CMPIObjectPath* const target =
+                CMNewObjectPath(broker(), Testing::NameSpace, "Part", nullptr);
+            const CMPIEnumeration* const found =
+                CBEnumInstances(broker(), call.context, target, nullptr, &status);
+            while (found != nullptr && CMHasNext(found, nullptr))
+                CMReturnInstance(call.result, CMGetNext(found, nullptr).value.inst);
+            return status;
+        });
+        providers_["BoxLinks"].handle([this](const ProviderCall& call) { return answer(call); });
+        providers_["ThingLinks"].handle(
+            [this](const ProviderCall&) { return failure(CMPI_RC_ERR_NOT_SUPPORTED, "no"); });
+    }
+};
+
+TEST_F(ManagerThreadsTest, everyRequestGetsItsWholeAnswer)
+{
+    std::atomic<int> wrong = 0;
+    onThreads([&] {
+        for (int i = 0; i < 50; ++i) {
+            Host::Request request(manager_.broker());
+            Host::CollectedResult found;
+            manager_.enumerateInstances(
+                request.context(), request.makePath(Testing::NameSpace, "Thing"), nullptr, found);
+            Host::CollectedResult names;
+            manager_.associatorNames(
+                request.context(), request.makePath(Testing::NameSpace, "Box"), {}, names);
+            if (found.instances().size() != 4 || names.paths().size() != 1)
+                ++wrong;
+        }
+    });
+    EXPECT_EQ(wrong, 0);
+}
+
+TEST(LoadedProvidersThreads, makeEachInterfaceOnce)
+{
+    const std::string file = SENSOR_PROFILE_BINARY_DIR "/lib/libOddProvider.so";
+    void* const witness = ::dlopen(file.c_str(), RTLD_NOW | RTLD_LOCAL);
+    const auto report =
+        reinterpret_cast<Testing::OddProviderReportFunction>(::dlsym(witness, "oddProviderReport"));
+    const Host::Broker broker;
+    {
+        Host::LoadedProviders providers(broker);
+        const Host::ProviderRegistration registration = {"Any", "Leaving", file, true, true};
+        onThreads([&] {
+            for (int i = 0; i < 20; ++i) {
+                providers.instanceMI(registration);
+                providers.associationMI(registration);
+            }
+        });
+        EXPECT_EQ(report()->created, 2);
+    }
+    EXPECT_EQ(report()->cleanedUp, 2);
+    ::dlclose(witness);
+}
+
+} // namespace

@@ -1,0 +1,175 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// Providers that ask the manager for objects of other providers.
+
+#include "tests/host/manager/ManagerTest.h"
+
+namespace {
+
+using ::testing::ElementsAre;
+using Testing::ProviderCall;
+using Testing::refusalOf;
+using ::testing::StartsWith;
+
+constexpr CMPIStatus Ok = {CMPI_RC_OK, nullptr};
+
+class ManagerUpcallsTest : public Testing::ManagerTest {
+protected:
+    // What a provider gets for its path.
+    CMPIObjectPath* target(const char* className) const
+    {
+        return CMNewObjectPath(broker(), Testing::NameSpace, className, nullptr);
+    }
+
+    // Hands over all that an up-call found.
+    static CMPIStatus handOver(
+        const ProviderCall& call, const CMPIEnumeration* found, const CMPIStatus& status)
+    {
+        if (found == nullptr)
+            return status;
+        while (CMHasNext(found, nullptr)) {
+            const CMPIData data = CMGetNext(found, nullptr);
+            if (data.type == CMPI_ref)
+                CMReturnObjectPath(call.result, data.value.ref);
+            else
+                CMReturnInstance(call.result, data.value.inst);
+        }
+        return Ok;
+    }
+};
+
+TEST_F(ManagerUpcallsTest, whatAProviderFindsCanBeHandedOver)
+{
+    script("Boxes", [this](const ProviderCall& call) {
+        CMPIStatus status = Ok;
+        const CMPIEnumeration* const found =
+            CBEnumInstanceNames(broker(), call.context, target("Part"), &status);
+        return handOver(call, found, status);
+    });
+    manager_.enumerateInstanceNames(context(), path("Box"), answer_);
+    EXPECT_THAT(delivered(answer_), ElementsAre("Part", "SpecialPart"));
+    EXPECT_THAT(
+        calls_, ElementsAre("Boxes enumerateInstanceNames Box", "Parts enumerateInstanceNames Part",
+                    "SpecialParts enumerateInstanceNames SpecialPart"));
+}
+
+TEST_F(ManagerUpcallsTest, instancesAndSingleOnesAreFoundToo)
+{
+    script("Boxes", [this](const ProviderCall& call) {
+        CMPIStatus status = Ok;
+        CMReturnInstance(
+            call.result, CBGetInstance(broker(), call.context, target("Part"), nullptr, &status));
+        const CMPIEnumeration* const found =
+            CBEnumInstances(broker(), call.context, target("SpecialPart"), nullptr, &status);
+        return handOver(call, found, status);
+    });
+    manager_.enumerateInstances(context(), path("Box"), nullptr, answer_);
+    EXPECT_THAT(delivered(answer_), ElementsAre("Part", "SpecialPart"));
+}
+
+TEST_F(ManagerUpcallsTest, associationsAreFollowed)
+{
+    script("BoxLinks", [this](const ProviderCall& call) { return deliver(call, "Box", "one"); });
+    script("ThingLinks",
+        [this](const ProviderCall& call) { return deliver(call, "ThingLink", "one"); });
+    script("Boxes", [this](const ProviderCall& call) {
+        CMPIStatus status = Ok;
+        CMPIObjectPath* const source = target("Part");
+        handOver(call,
+            CBAssociatorNames(
+                broker(), call.context, source, "BoxLink", nullptr, nullptr, nullptr, &status),
+            status);
+        return handOver(call,
+            CBReferenceNames(broker(), call.context, source, "ThingLink", nullptr, &status),
+            status);
+    });
+    manager_.enumerateInstanceNames(context(), path("Box"), answer_);
+    EXPECT_THAT(delivered(answer_), ElementsAre("Box", "ThingLink"));
+}
+
+TEST_F(ManagerUpcallsTest, theContextIsTheCallersAllTheWayDown)
+{
+    const CMPIContext* seen = nullptr;
+    script("Boxes", [this](const ProviderCall& call) {
+        CBEnumInstanceNames(broker(), call.context, target("SpecialPart"), nullptr);
+        return Ok;
+    });
+    script("SpecialParts", [&](const ProviderCall& call) {
+        seen = call.context;
+        return Ok;
+    });
+    manager_.enumerateInstanceNames(context(), path("Box"), answer_);
+    EXPECT_EQ(seen, context().handle());
+}
+
+TEST_F(ManagerUpcallsTest, anErrorReachesTheCallerWithItsMessage)
+{
+    script("SpecialParts",
+        [&](const ProviderCall&) { return failure(CMPI_RC_ERR_ACCESS_DENIED, "not for you"); });
+    script("Boxes", [this](const ProviderCall& call) {
+        CMPIStatus status = Ok;
+        const CMPIInstance* const found =
+            CBGetInstance(broker(), call.context, target("SpecialPart"), nullptr, &status);
+        EXPECT_EQ(found, nullptr);
+        return status;
+    });
+    EXPECT_EQ(refusalOf([&] { manager_.getInstance(context(), path("Box"), nullptr); }),
+        "code 2: not for you");
+}
+
+TEST_F(ManagerUpcallsTest, unknownAndUnservedClassesAreToldApart)
+{
+    script("Boxes", [this](const ProviderCall& call) {
+        CMPIStatus status = Ok;
+        CBEnumInstances(broker(), call.context, target("Unheard"), nullptr, &status);
+        EXPECT_EQ(status.rc, CMPI_RC_ERR_INVALID_CLASS);
+        CBEnumInstances(broker(), call.context, target("Idle"), nullptr, &status);
+        EXPECT_EQ(status.rc, CMPI_RC_ERR_NOT_SUPPORTED);
+        return answer(call);
+    });
+    manager_.getInstance(context(), path("Box"), nullptr);
+}
+
+TEST_F(ManagerUpcallsTest, aCircleEndsInAnError)
+{
+    script("Boxes", [this](const ProviderCall& call) {
+        CMPIStatus status = Ok;
+        const CMPIEnumeration* const found =
+            CBEnumInstances(broker(), call.context, target("SpecialPart"), nullptr, &status);
+        return handOver(call, found, status);
+    });
+    script("SpecialParts", [this](const ProviderCall& call) {
+        CMPIStatus status = Ok;
+        const CMPIEnumeration* const found =
+            CBEnumInstances(broker(), call.context, target("Box"), nullptr, &status);
+        return handOver(call, found, status);
+    });
+    for (int time = 0; time < 2; ++time) {
+        calls_.clear();
+        EXPECT_EQ(refusalOf([&] {
+            manager_.enumerateInstances(context(), path("Box"), nullptr, answer_);
+        }),
+            "code 1: Boxes is not asked: more than 10 provider calls stand in one another");
+        EXPECT_EQ(calls_.size(), 10U);
+    }
+}
+
+TEST_F(ManagerUpcallsTest, withoutARequestOnTheThreadThereIsNoAnswer)
+{
+    Host::Context& borrowed = request_->context();
+    std::thread([&] {
+        CMPIStatus status = Ok;
+        EXPECT_EQ(
+            CBEnumInstances(broker(), borrowed.handle(), path("Box").handle(), nullptr, &status),
+            nullptr);
+        EXPECT_THAT(status.rc, testing::Ne(CMPI_RC_OK));
+    }).join();
+}
+
+TEST_F(ManagerUpcallsTest, theBrokerSaysWhatItOffers)
+{
+    const unsigned wanted = CMPI_MB_BasicRead | CMPI_MB_AssociationTraversal;
+    EXPECT_EQ(broker()->bft->brokerCapabilities & wanted, wanted);
+}
+
+} // namespace

@@ -1,0 +1,134 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// The real libraries under the manager.
+
+#include "host/manager/SensorProfile.h"
+
+#include "host/broker/CollectedResult.h"
+#include "host/broker/Instance.h"
+#include "host/broker/ObjectPath.h"
+#include "host/broker/Refusal.h"
+#include "host/broker/Request.h"
+#include "host/manager/Manager.h"
+#include "tests/support/Environment.h"
+#include "tests/support/TemporaryFolder.h"
+
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+#include <thread>
+
+namespace {
+
+using testing::HasSubstr;
+
+const std::string sensorLibrary = SENSOR_PROFILE_BINARY_DIR "/lib/libSensorProfileProvider.so";
+const std::string systemLibrary = SENSOR_PROFILE_BINARY_DIR "/lib/libComputerSystemProvider.so";
+
+constexpr const char* nameSpace = "root/cimv2";
+constexpr const char* model = R"({ "nodes": [
+    { "type": "temperature", "path": "/board/temp1", "description": "Temp", "status": 1 },
+    { "type": "tachometer", "path": "/board/fan1", "description": "Fan", "status": 1 } ] })";
+
+class SensorProfileTest : public testing::Test {
+protected:
+    std::size_t count(Host::Manager& manager, const char* className)
+    {
+        Host::Request request(manager.broker());
+        Host::CollectedResult answer;
+        manager.enumerateInstances(
+            request.context(), request.makePath(nameSpace, className), nullptr, answer);
+        return answer.instances().size();
+    }
+
+    Testing::TemporaryFolder folder_;
+    Testing::EnvironmentVariable machine_{
+        "VORN_INSTRUMENTATION", "model:" + folder_.write("model.json", model)};
+    const Host::ClassTable classes_ = Host::sensorProfileClasses();
+};
+
+TEST_F(SensorProfileTest, everyClassIsServed)
+{
+    Host::Manager manager(classes_, Host::sensorProfileProviders(sensorLibrary, systemLibrary));
+    EXPECT_EQ(count(manager, "ZUMLO_NumericSensor"), 2U);
+    EXPECT_EQ(count(manager, "ZUMLO_ComputerSystem"), 1U);
+    EXPECT_EQ(count(manager, "ZUMLO_SensorEnabledLogicalElementCapabilities"), 1U);
+    EXPECT_EQ(count(manager, "ZUMLO_SensorElementCapabilities"), 2U);
+    EXPECT_EQ(count(manager, "ZUMLO_SensorSystemDevice"), 2U);
+    EXPECT_EQ(count(manager, "CIM_ManagedElement"), 4U);
+    EXPECT_EQ(count(manager, "CIM_Component"), 2U);
+}
+
+TEST_F(SensorProfileTest, everyObjectsOwnPathFindsIt)
+{
+    Host::Manager manager(classes_, Host::sensorProfileProviders(sensorLibrary, systemLibrary));
+    Host::Request request(manager.broker());
+    for (const char* const className :
+        {"CIM_ManagedElement", "CIM_Component", "CIM_ElementCapabilities"}) {
+        Host::CollectedResult answer;
+        manager.enumerateInstances(
+            request.context(), request.makePath(nameSpace, className), nullptr, answer);
+        for (const Host::Instance* const each : answer.instances()) {
+            const Host::ObjectPath& path = each->objectPath();
+            const Host::Instance& found = manager.getInstance(request.context(), path, nullptr);
+            EXPECT_EQ(found.objectPath().toText(), path.toText());
+        }
+    }
+}
+
+TEST_F(SensorProfileTest, theSystemLeadsToItsSensorsAndBack)
+{
+    Host::Manager manager(classes_, Host::sensorProfileProviders(sensorLibrary, systemLibrary));
+    Host::Request request(manager.broker());
+    Host::CollectedResult systems;
+    manager.enumerateInstanceNames(
+        request.context(), request.makePath(nameSpace, "CIM_ComputerSystem"), systems);
+    ASSERT_EQ(systems.paths().size(), 1U);
+    Host::CollectedResult sensors;
+    manager.associatorNames(request.context(), *systems.paths()[0],
+        {.associationClass = "CIM_SystemDevice", .resultRole = "PartComponent"}, sensors);
+    ASSERT_EQ(sensors.paths().size(), 2U);
+    Host::CollectedResult back;
+    manager.associatorNames(
+        request.context(), *sensors.paths()[0], {.resultClass = "CIM_System"}, back);
+    ASSERT_EQ(back.paths().size(), 1U);
+    EXPECT_EQ(back.paths()[0]->className(), "ZUMLO_ComputerSystem");
+}
+
+TEST_F(SensorProfileTest, withoutTheCompanionSensorsAreStillServed)
+{
+    Host::Manager manager(classes_, Host::sensorProfileProviders(sensorLibrary, std::nullopt));
+    EXPECT_EQ(count(manager, "ZUMLO_NumericSensor"), 2U);
+    EXPECT_THROW(count(manager, "ZUMLO_ComputerSystem"), Host::Refusal);
+}
+
+TEST_F(SensorProfileTest, aMissingLibraryIsAFailureThatNamesIt)
+{
+    Host::Manager manager(
+        classes_, Host::sensorProfileProviders(sensorLibrary, "/no/such/library.so"));
+    EXPECT_EQ(count(manager, "ZUMLO_NumericSensor"), 2U);
+    try {
+        count(manager, "ZUMLO_ComputerSystem");
+        FAIL() << "no failure";
+    } catch (const Host::Refusal& refusal) {
+        EXPECT_EQ(refusal.code(), CMPI_RC_ERR_FAILED);
+        EXPECT_THAT(refusal.what(), HasSubstr("/no/such/library.so"));
+    }
+}
+
+TEST_F(SensorProfileTest, eightThreadsWalkAtOnce)
+{
+    Host::Manager manager(classes_, Host::sensorProfileProviders(sensorLibrary, systemLibrary));
+    std::vector<std::thread> threads;
+    for (int i = 0; i < 8; ++i)
+        threads.emplace_back([&] {
+            for (int round = 0; round < 5; ++round) {
+                EXPECT_EQ(count(manager, "CIM_ManagedElement"), 4U);
+                EXPECT_EQ(count(manager, "ZUMLO_SensorSystemDevice"), 2U);
+            }
+        });
+    for (std::thread& thread : threads)
+        thread.join();
+}
+
+} // namespace
