@@ -8,6 +8,8 @@
 #include <memory>
 #include <utility>
 
+#include <sys/stat.h>
+
 namespace Vorn::Hwmon {
 
 namespace {
@@ -51,6 +53,14 @@ std::string printedName(const sensors_chip_name& chip)
     std::array<char, 256> name{};
     const int length = sensors_snprintf_chip_name(name.data(), name.size(), &chip);
     return length < 0 ? std::string(chip.prefix) : std::string(name.data());
+}
+
+std::optional<std::pair<dev_t, ino_t>> folderOf(const sensors_chip_name& chip)
+{
+    struct stat folder = {};
+    if (stat(chip.path, &folder) != 0)
+        return std::nullopt;
+    return std::pair{folder.st_dev, folder.st_ino};
 }
 
 std::string labelOf(const Feature& feature)

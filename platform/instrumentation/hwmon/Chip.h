@@ -7,8 +7,12 @@
 
 #include <sensors/sensors.h>
 
+#include <optional>
 #include <string>
+#include <utility>
 #include <vector>
+
+#include <sys/types.h>
 
 namespace Vorn::Hwmon {
 
@@ -40,7 +44,12 @@ std::vector<const sensors_feature*> featuresOf(
 // Such as "coretemp-isa-0000".
 std::string printedName(const sensors_chip_name& chip);
 
-// The administrator's label or the driver's, as it stands; empty when there is none.
+// Which folder of the kernel the chip is: a chip that was unplugged and plugged in again is
+// another one. Nothing when it is gone.
+std::optional<std::pair<dev_t, ino_t>> folderOf(const sensors_chip_name& chip);
+
+// The administrator's label or the driver's, as it stands, else the feature's name; the latter
+// also when the chip has just gone. Empty when libsensors has no memory.
 std::string labelOf(const Feature& feature);
 
 FeatureId identify(const Feature& feature);

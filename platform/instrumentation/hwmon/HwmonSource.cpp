@@ -8,6 +8,9 @@
 #include "platform/instrumentation/hwmon/ChipList.h"
 #include "platform/instrumentation/hwmon/Status.h"
 
+#include <algorithm>
+#include <iterator>
+
 namespace Vorn {
 
 using NodeLexicon::NodeType;
@@ -56,13 +59,25 @@ std::vector<Node> HwmonSource::nodes(NodeType type)
     const auto lock = Hwmon::ChipList::instance().lockPresent();
     std::vector<Node> nodes;
     for (const sensors_chip_name* chip : Hwmon::detectedChips()) {
-        const std::string folder = "/hwmon/" + Hwmon::printedName(*chip) + "/";
-        for (const sensors_feature* entry : Hwmon::featuresOf(*chip, featureTypeOf(type))) {
-            const Hwmon::Feature feature{chip, entry};
-            nodes.push_back({folder + entry->name, descriptionOf(feature),
-                static_cast<unsigned>(type), listed_.size()});
-            listed_.push_back(Hwmon::identify(feature));
-        }
+        const auto folder = Hwmon::folderOf(*chip);
+        std::vector<Node> found = nodesOf(*chip, type);
+        // Of a chip that went while it was listed, nothing is known for sure: not even the
+        // labels, by which sensors are named.
+        if (folder && folder == Hwmon::folderOf(*chip))
+            std::move(found.begin(), found.end(), std::back_inserter(nodes));
+    }
+    return nodes;
+}
+
+std::vector<Node> HwmonSource::nodesOf(const sensors_chip_name& chip, NodeType type)
+{
+    const std::string folder = "/hwmon/" + Hwmon::printedName(chip) + "/";
+    std::vector<Node> nodes;
+    for (const sensors_feature* entry : Hwmon::featuresOf(chip, featureTypeOf(type))) {
+        const Hwmon::Feature feature{&chip, entry};
+        nodes.push_back({folder + entry->name, descriptionOf(feature), static_cast<unsigned>(type),
+            listed_.size()});
+        listed_.push_back(Hwmon::identify(feature));
     }
     return nodes;
 }

@@ -9,6 +9,8 @@
 #include <memory>
 #include <vector>
 
+struct sensors_chip_name;
+
 namespace Vorn {
 
 namespace Hwmon {
@@ -30,6 +32,8 @@ public:
     NodeReading read(const Node& node) override;
 
 private:
+    std::vector<Node> nodesOf(const sensors_chip_name& chip, NodeLexicon::NodeType type);
+
     std::vector<Hwmon::FeatureId> listed_; // a node's token is its place here
 };
 
