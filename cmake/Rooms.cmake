@@ -16,7 +16,7 @@ function(sensor_profile_test name)
   cmake_parse_arguments(test "" "" "SOURCES;USES;ENVIRONMENT" ${ARGN})
   sensor_profile_test_executable(${name} ${test_SOURCES})
   target_precompile_headers(${name} REUSE_FROM test_headers)
-  target_link_libraries(${name} PRIVATE ${test_USES})
+  target_link_libraries(${name} PRIVATE ${test_USES} support_log)
   add_test(NAME ${name} COMMAND ${name})
   # The settings of the person who runs the tests must not reach them.
   set_tests_properties(${name} PROPERTIES
@@ -30,7 +30,7 @@ function(sensor_profile_test_executable name)
   target_include_directories(${name} PRIVATE "${PROJECT_SOURCE_DIR}")
   target_link_libraries(${name} PRIVATE GTest::gmock GTest::gtest_main)
   # What is measured and hardened is the rooms' code; optimising the tests only costs time.
-  target_compile_options(${name} PRIVATE $<$<CONFIG:Release>:-O1>)
+  target_compile_options(${name} PRIVATE $<IF:$<CONFIG:Release>,-O1,-O0>)
   target_compile_definitions(${name} PRIVATE
     SENSOR_PROFILE_SOURCE_DIR="${PROJECT_SOURCE_DIR}"
     SENSOR_PROFILE_BINARY_DIR="${PROJECT_BINARY_DIR}")

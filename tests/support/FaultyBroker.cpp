@@ -151,6 +151,12 @@ void setStatus(const Other&, CMPIrc)
 {
 }
 
+template <typename Handle, typename... Rest>
+void loseHandle(Handle* object, const Rest&...)
+{
+    const_cast<std::remove_const_t<Handle>*>(object)->hdl = nullptr;
+}
+
 template <BrokerCall call, auto slot>
 struct Interposed;
 template <BrokerCall call, typename Table, typename Answer, typename... Arguments,
@@ -168,6 +174,11 @@ struct Interposed<call, slot> {
         if (fault == nullptr)
             return realCall();
         if constexpr (std::is_same_v<Answer, CMPIStatus>) {
+            if (fault->manner == FaultManner::lostHandle) {
+                const Answer answer = realCall();
+                loseHandle(arguments...);
+                return answer;
+            }
             return {fault->code, nullptr};
         } else {
             const Answer answer = failed<Answer>(fault->manner, realCall);
@@ -297,6 +308,7 @@ std::span<const FaultManner> mannersOf(BrokerCall call)
         FaultManner::nullResult, FaultManner::handleless, FaultManner::errorStatus};
     static constexpr std::array plain = {FaultManner::nullResult, FaultManner::errorStatus};
     static constexpr std::array status = {FaultManner::errorStatus};
+    static constexpr std::array keyed = {FaultManner::errorStatus, FaultManner::lostHandle};
     switch (call) {
     case BrokerCall::getCharPtr:
     case BrokerCall::getKeyCount:
@@ -306,13 +318,14 @@ std::span<const FaultManner> mannersOf(BrokerCall call)
     case BrokerCall::setElementAt:
     case BrokerCall::setNameSpace:
     case BrokerCall::setHostname:
-    case BrokerCall::addKey:
     case BrokerCall::setProperty:
     case BrokerCall::setPropertyFilter:
     case BrokerCall::returnInstance:
     case BrokerCall::returnObjectPath:
     case BrokerCall::returnDone:
         return status;
+    case BrokerCall::addKey:
+        return keyed;
     default:
         return object;
     }
@@ -325,6 +338,8 @@ std::string nameOf(FaultManner manner)
         return "nullResult";
     case FaultManner::handleless:
         return "handleless";
+    case FaultManner::lostHandle:
+        return "lostHandle";
     default:
         return "errorStatus";
     }

@@ -75,6 +75,8 @@ enum class FaultManner {
     // The call is made and its result comes back, but the status says that it failed. A call
     // that answers with nothing but a status is not made.
     errorStatus,
+    // The call is made and succeeds; the object it was made on has no handle afterwards.
+    lostHandle,
 };
 
 // The manners in which a call can fail at all.

@@ -7,11 +7,7 @@
 #include "platform/logging/Configuration.h"
 #include "tests/support/TemporaryFolder.h"
 
-#include <gtest/gtest.h>
-
-#include <fstream>
 #include <ostream>
-#include <regex>
 #include <string>
 #include <vector>
 
@@ -35,6 +31,10 @@ inline std::ostream& operator<<(std::ostream& out, const LogLine& line)
                << '(' << line.file << ':' << line.line << ") " << line.text;
 }
 
+// A line without its pointers: `setVector(Sensor:740) 3000 ENTERING: ... =PTR`.
+std::string withoutPointers(const LogLine& line);
+std::vector<std::string> withoutPointers(const std::vector<LogLine>& lines);
+
 class LogCapture {
 public:
     explicit LogCapture(int level = 0)
@@ -52,24 +52,7 @@ public:
 private:
     std::filesystem::path path(const char* channel) const { return folder_.path() / channel; }
 
-    std::vector<LogLine> lines(const char* channel) const
-    {
-        // time, channel, level, component, function(file:line), text
-        static const std::regex format(
-            R"(^(\S+) (log|trace) (\d+) (\S+) (\S+)\(([^:]*):(\d+)\) (.*)$)");
-        std::vector<LogLine> found;
-        std::ifstream in(path(channel));
-        for (std::string line; std::getline(in, line);) {
-            std::smatch m;
-            if (!std::regex_match(line, m, format)) {
-                ADD_FAILURE() << "not a log line: " << line;
-                continue;
-            }
-            found.push_back({m[2], std::stoi(m[3]), m[4], m[5], m[6],
-                static_cast<unsigned>(std::stoul(m[7])), m[8]});
-        }
-        return found;
-    }
+    std::vector<LogLine> lines(const char* channel) const;
 
     TemporaryFolder folder_;
 };

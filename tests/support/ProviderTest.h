@@ -19,7 +19,6 @@
 
 #include <memory>
 #include <ostream>
-#include <regex>
 #include <string>
 #include <string_view>
 #include <utility>
@@ -45,22 +44,6 @@ inline std::string textOf(const CMPIString* string)
 {
     const Host::String* const found = Host::String::of(string);
     return found ? std::string(found->text().value_or("(null)")) : "(null)";
-}
-
-// A trace line without its pointers: `setVector(Sensor:740) 3000 ENTERING: ... =PTR`.
-inline std::string withoutPointers(const LogLine& line)
-{
-    static const std::regex pointer("=0x[0-9a-f]+");
-    return line.function + "(" + line.file + ":" + std::to_string(line.line) + ") " +
-           std::to_string(line.level) + " " + std::regex_replace(line.text, pointer, "=PTR");
-}
-
-inline std::vector<std::string> withoutPointers(const std::vector<LogLine>& lines)
-{
-    std::vector<std::string> texts;
-    for (const LogLine& line : lines)
-        texts.push_back(withoutPointers(line));
-    return texts;
 }
 
 class ProviderTest : public ::testing::Test {

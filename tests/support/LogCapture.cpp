@@ -1,0 +1,46 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "tests/support/LogCapture.h"
+
+#include <gtest/gtest.h>
+
+#include <fstream>
+#include <regex>
+
+namespace Testing {
+
+std::string withoutPointers(const LogLine& line)
+{
+    static const std::regex pointer("=0x[0-9a-f]+");
+    return line.function + "(" + line.file + ":" + std::to_string(line.line) + ") " +
+           std::to_string(line.level) + " " + std::regex_replace(line.text, pointer, "=PTR");
+}
+
+std::vector<std::string> withoutPointers(const std::vector<LogLine>& lines)
+{
+    std::vector<std::string> texts;
+    for (const LogLine& line : lines)
+        texts.push_back(withoutPointers(line));
+    return texts;
+}
+
+std::vector<LogLine> LogCapture::lines(const char* channel) const
+{
+    // time, channel, level, component, function(file:line), text
+    static const std::regex format(
+        R"(^(\S+) (log|trace) (\d+) (\S+) (\S+)\(([^:]*):(\d+)\) (.*)$)");
+    std::vector<LogLine> found;
+    std::ifstream in(path(channel));
+    for (std::string line; std::getline(in, line);) {
+        std::smatch m;
+        if (!std::regex_match(line, m, format)) {
+            ADD_FAILURE() << "not a log line: " << line;
+            continue;
+        }
+        found.push_back({m[2], std::stoi(m[3]), m[4], m[5], m[6],
+            static_cast<unsigned>(std::stoul(m[7])), m[8]});
+    }
+    return found;
+}
+
+} // namespace Testing
