@@ -1,0 +1,185 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// Requests of an association provider, from the object manager's side.
+
+#pragma once
+
+#include "host/broker/Instance.h"
+#include "tests/providers/ComputerSystems.h"
+#include "tests/providers/Factories.h"
+#include "tests/providers/ProfileClasses.h"
+#include "tests/support/ProviderTest.h"
+
+#include <string>
+#include <vector>
+
+namespace Testing {
+
+constexpr const char* SensorClass = "ZUMLO_NumericSensor";
+constexpr const char* SystemClass = "ZUMLO_ComputerSystem";
+constexpr const char* CapabilitiesClass = "ZUMLO_SensorEnabledLogicalElementCapabilities";
+constexpr const char* CapabilitiesID = "ZUMLO:SensorEnabledLogicalElementCap1";
+
+// The rest of what a client says when it asks for associated objects.
+struct Filter {
+    const char* associationClass = nullptr;
+    const char* resultClass = nullptr;
+    const char* role = nullptr;
+    const char* resultRole = nullptr;
+    const char** properties = nullptr;
+};
+
+// Harvested as C, B, A.
+inline const std::vector<ScriptedNode> ThreeSensors = {
+    {Vorn::NodeLexicon::NodeType::Temperature, "/3", "C", Vorn::NodeReading{}},
+    {Vorn::NodeLexicon::NodeType::Voltage, "/2", "B", Vorn::NodeReading{}},
+    {Vorn::NodeLexicon::NodeType::Tachometer, "/1", "A", Vorn::NodeReading{}}};
+
+class AssociationTest : public ProviderTest {
+protected:
+    AssociationTest(
+        CMPIInstanceMI* (*instances)(const CMPIBroker*, const CMPIContext*, CMPIStatus*),
+        CMPIAssociationMI* (*associations)(const CMPIBroker*, const CMPIContext*, CMPIStatus*),
+        std::vector<ScriptedNode> nodes, std::vector<std::string> systems)
+        : machine_(std::move(nodes)), systems_(std::move(systems)),
+          instanceMI_(instances(broker(), nullptr, nullptr)),
+          associationMI_(associations(broker(), nullptr, nullptr))
+    {
+        broker_.setClassInformation(&profileClasses());
+        broker_.setUpcalls(&systems_);
+    }
+
+    // ---- Ends ----
+
+    Host::ObjectPath& sensor(const std::string& deviceID, const char* nameSpace = NameSpace)
+    {
+        Host::ObjectPath& made = path(SensorClass,
+            {{"CreationClassName", SensorClass}, {"DeviceID", deviceID},
+                {"SystemCreationClassName", SystemClass}, {"SystemName", systemName_}},
+            nameSpace);
+        made.setHost(systemName_.c_str());
+        return made;
+    }
+
+    Host::ObjectPath& capabilities(const char* nameSpace = NameSpace)
+    {
+        Host::ObjectPath& made =
+            path(CapabilitiesClass, {{"InstanceID", CapabilitiesID}}, nameSpace);
+        made.setHost(systemName_.c_str());
+        return made;
+    }
+
+    Host::ObjectPath& system(const std::string& name, const char* nameSpace = NameSpace)
+    {
+        return path(SystemClass, {{"CreationClassName", SystemClass}, {"Name", name}}, nameSpace);
+    }
+
+    // ---- Requests ----
+
+    CMPIStatus enumerateNames(const Host::ObjectPath& ref)
+    {
+        return instanceMI_->ft->enumerateInstanceNames(
+            instanceMI_, context(), result(), ref.handle());
+    }
+
+    CMPIStatus enumerate(const Host::ObjectPath& ref, const char** properties = nullptr)
+    {
+        return instanceMI_->ft->enumerateInstances(
+            instanceMI_, context(), result(), ref.handle(), properties);
+    }
+
+    CMPIStatus get(const Host::ObjectPath& ref, const char** properties = nullptr)
+    {
+        return instanceMI_->ft->getInstance(
+            instanceMI_, context(), result(), ref.handle(), properties);
+    }
+
+    CMPIStatus associators(const Host::ObjectPath& source, const Filter& filter = {})
+    {
+        return associationMI_->ft->associators(associationMI_, context(), result(), source.handle(),
+            filter.associationClass, filter.resultClass, filter.role, filter.resultRole,
+            filter.properties);
+    }
+
+    CMPIStatus associatorNames(const Host::ObjectPath& source, const Filter& filter = {})
+    {
+        return associationMI_->ft->associatorNames(associationMI_, context(), result(),
+            source.handle(), filter.associationClass, filter.resultClass, filter.role,
+            filter.resultRole);
+    }
+
+    CMPIStatus references(const Host::ObjectPath& source, const Filter& filter = {})
+    {
+        return associationMI_->ft->references(associationMI_, context(), result(), source.handle(),
+            filter.resultClass, filter.role, filter.properties);
+    }
+
+    CMPIStatus referenceNames(const Host::ObjectPath& source, const Filter& filter = {})
+    {
+        return associationMI_->ft->referenceNames(
+            associationMI_, context(), result(), source.handle(), filter.resultClass, filter.role);
+    }
+
+    // ---- Answers ----
+
+    static void expectOk(const CMPIStatus& status)
+    {
+        EXPECT_EQ(status.rc, CMPI_RC_OK);
+        EXPECT_EQ(status.msg, nullptr);
+    }
+
+    static void expectFailure(const CMPIStatus& status, const std::string& text)
+    {
+        EXPECT_EQ(status.rc, CMPI_RC_ERR_FAILED);
+        EXPECT_EQ(textOf(status.msg), text);
+    }
+
+    // An answer of nothing, closed or left open.
+    void expectNothing(bool isDone)
+    {
+        EXPECT_TRUE(answer_.paths().empty());
+        EXPECT_TRUE(answer_.instances().empty());
+        EXPECT_EQ(answer_.refused(), 0U);
+        EXPECT_EQ(answer_.isDone(), isDone);
+    }
+
+    // The value that tells the object from its like: a sensor's, a system's or a capabilities'.
+    static std::string nameOf(const Host::ObjectPath& end)
+    {
+        for (const char* const key : {"DeviceID", "InstanceID", "Name"})
+            if (const Host::Value* const value = end.key(key))
+                return std::string(*value->text());
+        return "nameless";
+    }
+
+    // What was delivered, by its names.
+    std::vector<std::string> delivered() const
+    {
+        std::vector<std::string> names;
+        for (const Host::ObjectPath* const each : answer_.paths())
+            names.push_back(nameOf(*each));
+        for (const Host::Instance* const each : answer_.instances())
+            names.push_back(nameOf(each->objectPath()));
+        return names;
+    }
+
+    // The associations delivered, as pairs of the names of what two references refer to.
+    std::vector<std::string> pairs(const char* one, const char* other) const
+    {
+        std::vector<std::string> found;
+        for (const Host::ObjectPath* const each : answer_.paths())
+            found.push_back(
+                nameOf(*each->key(one)->path()) + " " + nameOf(*each->key(other)->path()));
+        for (const Host::Instance* const each : answer_.instances())
+            found.push_back(nameOf(*each->property(one)->path()) + " " +
+                            nameOf(*each->property(other)->path()));
+        return found;
+    }
+
+    ScriptedMachine machine_;
+    ComputerSystems systems_;
+    CMPIInstanceMI* instanceMI_;
+    CMPIAssociationMI* associationMI_;
+};
+
+} // namespace Testing

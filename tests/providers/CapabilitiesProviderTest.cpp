@@ -1,0 +1,258 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// The requests of ZUMLO_SensorEnabledLogicalElementCapabilities, from the object manager's side.
+
+#include "tests/providers/Factories.h"
+#include "tests/providers/ProfileClasses.h"
+#include "tests/support/ProviderTest.h"
+
+#include <gmock/gmock.h>
+
+namespace {
+
+using Testing::BrokerMessage;
+using Testing::describe;
+using ::testing::ElementsAre;
+using Testing::namesOf;
+using Testing::ProviderTest;
+using Testing::ScriptedMachine;
+using Vorn::NodeReading;
+using Vorn::NodeLexicon::NodeType;
+
+constexpr const char* Class = "ZUMLO_SensorEnabledLogicalElementCapabilities";
+constexpr const char* Provider = "SensorEnabledLogicalElementCapabilitiesProvider";
+constexpr const char* Identifier = "ZUMLO:SensorEnabledLogicalElementCap1";
+constexpr const char* NoKeyText = "At least one key should be passed";
+
+class CapabilitiesProviderTest : public ProviderTest {
+protected:
+    CapabilitiesProviderTest()
+        : machine_({{NodeType::Tachometer, "/f", "Fan", NodeReading{}}}),
+          mi_(SensorEnabledLogicalElementCapabilitiesProvider_Create_InstanceMI(
+              broker(), nullptr, nullptr))
+    {
+    }
+
+    CMPIStatus enumerateNames(const char* nameSpace = NameSpace)
+    {
+        return mi_->ft->enumerateInstanceNames(
+            mi_, context(), result(), path(Class, {}, nameSpace).handle());
+    }
+
+    CMPIStatus enumerate(const char** properties = nullptr)
+    {
+        return mi_->ft->enumerateInstances(
+            mi_, context(), result(), path(Class).handle(), properties);
+    }
+
+    CMPIStatus get(const Host::ObjectPath& ref, const char** properties = nullptr)
+    {
+        return mi_->ft->getInstance(mi_, context(), result(), ref.handle(), properties);
+    }
+
+    CMPIStatus get(const std::vector<std::pair<std::string, std::string>>& keys)
+    {
+        return get(path(Class, keys));
+    }
+
+    static void expectOk(const CMPIStatus& status)
+    {
+        EXPECT_EQ(status.rc, CMPI_RC_OK);
+        EXPECT_EQ(status.msg, nullptr);
+    }
+
+    void expectNothing(bool isDone)
+    {
+        EXPECT_TRUE(answer_.instances().empty());
+        EXPECT_EQ(answer_.refused(), 0U);
+        EXPECT_EQ(answer_.isDone(), isDone);
+        EXPECT_TRUE(messages_.empty());
+    }
+
+    ScriptedMachine machine_;
+    CMPIInstanceMI* mi_;
+};
+
+// ---- EnumInstanceNames ----
+
+TEST_F(CapabilitiesProviderTest, thereIsOneNameAndTheResultIsClosed)
+{
+    expectOk(enumerateNames("root/other"));
+    ASSERT_EQ(answer_.paths().size(), 1U);
+    const Host::ObjectPath& only = *answer_.paths()[0];
+    EXPECT_EQ(only.className(), Class);
+    EXPECT_EQ(only.nameSpace(), "root/other");
+    EXPECT_EQ(only.host(), systemName_);
+    EXPECT_THAT(describe(only.keys()),
+        ElementsAre("InstanceID = string \"ZUMLO:SensorEnabledLogicalElementCap1\""));
+    EXPECT_TRUE(answer_.isDone());
+    EXPECT_TRUE(messages_.empty());
+}
+
+TEST_F(CapabilitiesProviderTest, aMachineWithoutSensorsOrWithABrokenOneHasItsCapabilities)
+{
+    const ScriptedMachine empty;
+    expectOk(enumerateNames());
+    EXPECT_EQ(answer_.paths().size(), 1U);
+    ScriptedMachine broken;
+    broken.failConstruction();
+    Host::CollectedResult second;
+    Host::Result into(second);
+    expectOk(mi_->ft->enumerateInstanceNames(mi_, context(), into.handle(), path(Class).handle()));
+    EXPECT_EQ(second.paths().size(), 1U);
+}
+
+// ---- EnumInstances ----
+
+TEST_F(CapabilitiesProviderTest, thereIsOneInstanceAndTheResultIsClosed)
+{
+    expectOk(enumerate());
+    ASSERT_EQ(answer_.instances().size(), 1U);
+    EXPECT_THAT(describe(answer_.instances()[0]->properties()),
+        ElementsAre("InstanceID = string \"ZUMLO:SensorEnabledLogicalElementCap1\"",
+            "RequestedStatesSupported = [uint16 0, uint16 1, uint16 2]",
+            "ElementNameEditSupported = false"));
+    EXPECT_TRUE(answer_.isDone());
+    EXPECT_TRUE(messages_.empty());
+}
+
+TEST_F(CapabilitiesProviderTest, anInstanceHasTheListedPropertiesAndTheKey)
+{
+    const char* properties[] = {"RequestedStatesSupported", nullptr};
+    expectOk(enumerate(properties));
+    ASSERT_EQ(answer_.instances().size(), 1U);
+    EXPECT_THAT(namesOf(answer_.instances()[0]->properties()),
+        ElementsAre("InstanceID", "RequestedStatesSupported"));
+}
+
+TEST_F(CapabilitiesProviderTest, anEmptyListLeavesTheKeyAlone)
+{
+    const char* properties[] = {nullptr};
+    expectOk(enumerate(properties));
+    ASSERT_EQ(answer_.instances().size(), 1U);
+    EXPECT_THAT(namesOf(answer_.instances()[0]->properties()), ElementsAre("InstanceID"));
+}
+
+// ---- GetInstance ----
+
+TEST_F(CapabilitiesProviderTest, anInstanceIsFoundByItsIdentifier)
+{
+    const char* properties[] = {"ElementNameEditSupported", nullptr};
+    for (const char** const list : {static_cast<const char**>(nullptr), properties}) {
+        Host::CollectedResult found;
+        Host::Result into(found);
+        expectOk(mi_->ft->getInstance(mi_, context(), into.handle(),
+            path(Class, {{"InstanceID", Identifier}}).handle(), list));
+        ASSERT_EQ(found.instances().size(), 1U);
+        EXPECT_EQ(found.instances()[0]->properties().size(), list ? 2U : 3U);
+        EXPECT_TRUE(found.isDone());
+    }
+    EXPECT_TRUE(messages_.empty());
+}
+
+TEST_F(CapabilitiesProviderTest, theOtherKeysAndTheLetterCaseOfTheNamesDoNotMatter)
+{
+    expectOk(get(path("zumlo_sensorenabledlogicalelementcapabilities",
+        {{"Other", "x"}, {"instanceid", Identifier}})));
+    EXPECT_EQ(answer_.instances().size(), 1U);
+    EXPECT_TRUE(answer_.isDone());
+}
+
+TEST_F(CapabilitiesProviderTest, anUnknownIdentifierIsAnOpenEmptyAnswer)
+{
+    for (const char* const unknown : {"zumlo:sensorenabledlogicalelementcap1", "", "other",
+             "ZUMLO:SensorEnabledLogicalElementCap2", "ZUMLO:SensorEnabledLogicalElementCap1 "})
+        expectOk(get({{"InstanceID", unknown}}));
+    expectNothing(false);
+}
+
+TEST_F(CapabilitiesProviderTest, aPathWithoutKeysIsRefusedInAClosedResult)
+{
+    const CMPIStatus status = get(path(Class));
+    EXPECT_EQ(status.rc, CMPI_RC_ERR_FAILED);
+    EXPECT_EQ(Testing::textOf(status.msg), NoKeyText);
+    EXPECT_THAT(messages_, ElementsAre(BrokerMessage{2, Provider, NoKeyText}));
+    EXPECT_TRUE(answer_.instances().empty());
+    EXPECT_TRUE(answer_.isDone());
+}
+
+TEST_F(CapabilitiesProviderTest, aRefusalHasNoMessageWithoutABroker)
+{
+    SensorEnabledLogicalElementCapabilitiesProvider_Create_InstanceMI(nullptr, nullptr, nullptr);
+    const CMPIStatus status = get(path(Class));
+    EXPECT_EQ(status.rc, CMPI_RC_ERR_FAILED);
+    EXPECT_EQ(status.msg, nullptr);
+    EXPECT_TRUE(answer_.isDone());
+}
+
+TEST_F(CapabilitiesProviderTest, aRequestWithoutAPathIsRefused)
+{
+    const CMPIObjectPath handleless = {nullptr, &Host::ObjectPath::functions};
+    const CMPIStatus status = mi_->ft->getInstance(mi_, context(), result(), &handleless, nullptr);
+    EXPECT_EQ(status.rc, CMPI_RC_ERR_FAILED);
+    EXPECT_EQ(Testing::textOf(status.msg), NoKeyText);
+}
+
+// ---- A key that is no text: nothing is found, though the machine has a sensor ----
+
+TEST_F(CapabilitiesProviderTest, keysWithoutAnIdentifierAreAClosedEmptyAnswer)
+{
+    expectOk(get({{"Other", "x"}}));
+    expectNothing(true);
+}
+
+TEST_F(CapabilitiesProviderTest, anIdentifierOfAnotherTypeCountsAsAbsent)
+{
+    Host::ObjectPath& inner = path(Class, {{"InstanceID", Identifier}});
+    for (const Host::Value& value : {Host::Value::integer(CMPI_uint64, 7),
+             Host::Value::integer(CMPI_sint64, 7), Host::Value::boolean(true),
+             Host::Value::of(inner), Host::Value::null(CMPI_string), Host::Value::absent()}) {
+        Host::ObjectPath& ref = path(Class);
+        ref.addKey("InstanceID", value);
+        Host::CollectedResult found;
+        Host::Result into(found);
+        expectOk(mi_->ft->getInstance(mi_, context(), into.handle(), ref.handle(), nullptr));
+        EXPECT_TRUE(found.instances().empty());
+        EXPECT_TRUE(found.isDone());
+    }
+    EXPECT_TRUE(messages_.empty());
+}
+
+TEST_F(CapabilitiesProviderTest, aSensorsOwnPathFindsNothingHere)
+{
+    broker_.setClassInformation(&Testing::profileClasses());
+    expectOk(get(path("ZUMLO_NumericSensor",
+        {{"CreationClassName", "ZUMLO_NumericSensor"}, {"DeviceID", "Fan:/f"},
+            {"SystemCreationClassName", "ZUMLO_ComputerSystem"}, {"SystemName", systemName_}})));
+    expectNothing(true);
+}
+
+// ---- Round trip and factory ----
+
+TEST_F(CapabilitiesProviderTest, theNameThatIsEnumeratedCanBeFetched)
+{
+    broker_.setClassInformation(&Testing::profileClasses());
+    expectOk(enumerateNames());
+    ASSERT_EQ(answer_.paths().size(), 1U);
+    Host::CollectedResult fetched;
+    Host::Result into(fetched);
+    expectOk(
+        mi_->ft->getInstance(mi_, context(), into.handle(), answer_.paths()[0]->handle(), nullptr));
+    ASSERT_EQ(fetched.instances().size(), 1U);
+    EXPECT_EQ(fetched.instances()[0]->objectPath().toText(), answer_.paths()[0]->toText());
+}
+
+TEST_F(CapabilitiesProviderTest, theBrokerOfTheLastFactoryCallIsUsed)
+{
+    Host::Broker other;
+    std::vector<std::string> seen;
+    other.setTraceObserver(
+        [&](const Host::TraceMessage& message) { seen.emplace_back(message.text); });
+    SensorEnabledLogicalElementCapabilitiesProvider_Create_InstanceMI(
+        other.handle(), nullptr, nullptr);
+    get(path(Class));
+    EXPECT_THAT(seen, ElementsAre(NoKeyText));
+    EXPECT_TRUE(messages_.empty());
+}
+
+} // namespace

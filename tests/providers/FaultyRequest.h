@@ -1,0 +1,84 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// A request to a provider whose broker fails it.
+
+#pragma once
+
+#include "tests/support/FaultSweep.h"
+#include "tests/support/ProviderTest.h"
+
+#include <functional>
+#include <memory>
+#include <ostream>
+#include <string>
+#include <vector>
+
+namespace Testing {
+
+// What is asked, of which object.
+struct RequestKind {
+    std::string name;
+    std::function<Host::ObjectPath&(const Host::Request&)> source;
+    std::function<CMPIStatus(
+        const CMPIBroker*, const CMPIContext*, const CMPIResult*, const CMPIObjectPath*)>
+        run;
+};
+
+inline std::ostream& operator<<(std::ostream& out, const RequestKind& kind)
+{
+    return out << kind.name;
+}
+
+// One request with a broker of its own choosing, and all that came of it.
+class FaultyRequest {
+public:
+    FaultyRequest(Host::Broker& broker, FaultyBroker& faulty, const RequestKind& kind)
+        : request_(broker)
+    {
+        broker.setTraceObserver([this](const Host::TraceMessage& message) {
+            messages.push_back({static_cast<unsigned>(message.level),
+                std::string(message.component), std::string(message.text)});
+        });
+        const CMPIObjectPath* const source = faulty.watch(kind.source(request_).handle());
+        status = kind.run(
+            faulty.handle(), request_.context().handle(), faulty.watch(result_.handle()), source);
+        broker.setTraceObserver({});
+    }
+
+    std::string message() const { return textOf(status.msg); }
+
+    Host::CollectedResult answer;
+    std::vector<BrokerMessage> messages;
+    CMPIStatus status = {};
+
+private:
+    Host::Request request_;
+    Host::Result result_{answer};
+};
+
+class FaultTest : public ::testing::Test {
+protected:
+    // Runs the request with faults, all of which are to come true.
+    std::unique_ptr<FaultyRequest> run(const RequestKind& kind, const std::vector<Fault>& faults)
+    {
+        faulty_.reset(); // the last one made is the one in force, so they end in turn
+        faulty_ = std::make_unique<FaultyBroker>(broker_);
+        for (const Fault& fault : faults)
+            faulty_->plan(fault);
+        auto request = std::make_unique<FaultyRequest>(broker_, *faulty_, kind);
+        EXPECT_EQ(faulty_->fired(), faults.size()) << "the request does not get to the fault";
+        return request;
+    }
+    std::unique_ptr<FaultyRequest> run(const RequestKind& kind, const Fault& fault)
+    {
+        return run(kind, std::vector<Fault>{fault});
+    }
+
+    // How the first call of the kind can fail to deliver its object.
+    static constexpr FaultManner Undelivered[] = {FaultManner::nullResult, FaultManner::handleless};
+
+    Host::Broker broker_;
+    std::unique_ptr<FaultyBroker> faulty_;
+};
+
+} // namespace Testing

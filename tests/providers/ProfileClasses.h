@@ -1,0 +1,26 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// The keys of the profile's classes, as an object manager knows them from its repository.
+
+#pragma once
+
+#include "host/broker/ClassInformation.h"
+
+namespace Testing {
+
+inline const Host::ClassTable& profileClasses()
+{
+    static const Host::ClassTable classes = [] {
+        Host::ClassTable table;
+        table.add("ZUMLO_NumericSensor",
+            {"CreationClassName", "DeviceID", "SystemCreationClassName", "SystemName"});
+        table.add("ZUMLO_SensorEnabledLogicalElementCapabilities", {"InstanceID"});
+        table.add("ZUMLO_ComputerSystem", {"CreationClassName", "Name"});
+        table.add("ZUMLO_SensorElementCapabilities", {"ManagedElement", "Capabilities"});
+        table.add("ZUMLO_SensorSystemDevice", {"GroupComponent", "PartComponent"});
+        return table;
+    }();
+    return classes;
+}
+
+} // namespace Testing

@@ -1,0 +1,169 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// The trace lines of whole requests: what was written and what is expected, as
+//
+//     SensorFactory 3000 makeSensorInstance(SensorFactory:269) ENTERING: makeSensorInstance() in
+//     SensorFactory [Line: 269]
+//
+// Line numbers that follow the source instead of being an interface are left out, and so are
+// parameter lists but for the class names that a target is looked up with.
+
+#pragma once
+
+#include "tests/support/ProviderTest.h"
+
+#include <gtest/gtest.h>
+
+#include <set>
+#include <string>
+#include <vector>
+
+namespace Testing {
+
+using Lines = std::vector<std::string>;
+
+inline bool hasGivenLine(const LogLine& line)
+{
+    static const std::set<std::string> modules = {
+        "Nimbrel.SensorProfileProvider", "Nimbrel.SensorEnabledLogicalElementCapabilitiesProvider"};
+    static const std::set<std::string> operations = {"makeSensorInstance",
+        "makeSensorEnabledLogicalElementCapInstance",
+        "getAllSensorEnabledLogicalElementCapCMPIInstances",
+        "getOneSensorEnabledLogicalElementCapCMPIInstance",
+        "getAllSensorEnabledLogicalElementCapCMPIObjPaths", "get_assoc_targetClass_Name",
+        "get_assoc_targetClass_ObjectPath"};
+    return modules.contains(line.component) || operations.contains(line.function);
+}
+
+inline std::string place(const std::string& function, const std::string& file, unsigned line)
+{
+    return " " + function + "(" + file + (line ? ":" + std::to_string(line) : "") + ") ";
+}
+
+inline std::string requestLine(const LogLine& line)
+{
+    static const std::regex number(R"(( \[Line: \d+\])|(, Line: \d+))");
+    static const std::regex names(R"(.*( _RefLeftClass=.*) rc=.*)");
+    const std::size_t end = line.text.find(",Parameters");
+    std::string text = line.text.substr(0, end);
+    if (!hasGivenLine(line))
+        text = std::regex_replace(text, number, "");
+    if (std::smatch found; std::regex_match(line.text, found, names))
+        text += found[1];
+    const bool hasPlace = hasGivenLine(line) || line.file == "Trace";
+    return line.component.substr(std::string("Nimbrel.").size()) + " " +
+           std::to_string(line.level) + place(line.function, line.file, hasPlace ? line.line : 0) +
+           text;
+}
+
+// What a request writes to both channels, but for the lines of the harvest.
+template <typename Request>
+Lines traceOf(const Request& request)
+{
+    const LogCapture capture;
+    request();
+    const auto own = [](const std::vector<LogLine>& all) {
+        Lines lines; // the embedded broker writes to the trace channel, too
+        for (const LogLine& line : all)
+            if (line.component.starts_with("Nimbrel.") && line.component != "Nimbrel.Sensor")
+                lines.push_back(requestLine(line));
+        return lines;
+    };
+    EXPECT_EQ(own(capture.trace()), own(capture.log()));
+    return own(capture.log());
+}
+
+inline std::string numbered(const std::string& text, unsigned line)
+{
+    return line ? text + " [Line: " + std::to_string(line) + "]" : text;
+}
+
+// The expected lines of one handler. A line of 0 is not given.
+struct HandlerLines {
+    std::string component;
+    std::string module;
+    std::string handler;
+
+    Lines entry(unsigned line = 0) const
+    {
+        return {component + " 4000 markProviderEntry(Trace:336) " + std::string(78, '='),
+            component + " 4000 markProviderEntry(Trace:337) " +
+                numbered("ENTERING: " + handler + "() in " + module, line)};
+    }
+
+    Lines exit(unsigned line = 0) const
+    {
+        return {component + " 4000 markProviderExit(Trace:348) " +
+                    numbered("EXITING: " + handler + "() in " + module, line),
+            component + " 4000 markProviderExit(Trace:349) " + std::string(78, '=')};
+    }
+
+    Lines failure(const std::string& text, unsigned line = 0) const
+    {
+        return {component + " 6000" + place(handler, module, line) + "MESSAGE [File: " + module +
+                (line ? ", Line: " + std::to_string(line) : "") + "]: " + text};
+    }
+};
+
+inline std::string operationLine(const std::string& mark, const std::string& name, unsigned line,
+    int level = 3000, const std::string& parameters = {})
+{
+    return "SensorFactory " + std::to_string(level) + place(name, "SensorFactory", line) +
+           numbered(mark + ": " + name + "() in SensorFactory", line) + parameters;
+}
+
+// An operation of the factory.
+inline Lines operation(const std::string& name, unsigned entry = 0, unsigned exit = 0)
+{
+    return {operationLine("ENTERING", name, entry), operationLine("EXITING", name, exit)};
+}
+
+// One that does not get to its exit.
+inline Lines brokenOff(const std::string& name, unsigned entry = 0)
+{
+    return {operationLine("ENTERING", name, entry)};
+}
+
+inline Lines sequence(const std::vector<Lines>& parts)
+{
+    Lines lines;
+    for (const Lines& part : parts)
+        lines.insert(lines.end(), part.begin(), part.end());
+    return lines;
+}
+
+inline Lines around(const Lines& outer, const Lines& inner)
+{
+    return sequence({{outer.front()}, inner, {outer.back()}});
+}
+
+inline Lines counted()
+{
+    return {operationLine("ENTERING", "getNumberOfInstances", 0, 4000),
+        operationLine("EXITING", "getNumberOfInstances", 0, 4000)};
+}
+
+// The factory's construction with the maps it makes.
+inline Lines builtFactory(const Lines& maps)
+{
+    Lines inner;
+    for (const std::string& map : maps) {
+        inner.push_back(operationLine("ENTERING", map, 0, 4000));
+        inner.push_back(operationLine("EXITING", map, 0, 4000));
+    }
+    return around(operation("SensorFactory"), inner);
+}
+
+// The look-up of an association's target. `exit` is the line that its outcome has.
+inline Lines lookedUp(const std::string& association, const std::string& resultClass, unsigned exit)
+{
+    const std::string names = " _RefLeftClass=" + association + " _RefRightClass=" + resultClass;
+    const std::string path = "get_assoc_targetClass_ObjectPath";
+    const std::string name = "get_assoc_targetClass_Name";
+    return {operationLine("ENTERING", path, 1288, 3000, names),
+        operationLine("ENTERING", name, 1185, 3000, names),
+        operationLine("EXITING", name, exit, 3000, names),
+        operationLine("EXITING", path, 1316, 3000, names)};
+}
+
+} // namespace Testing
