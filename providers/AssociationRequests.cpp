@@ -2,11 +2,27 @@
 
 #include "providers/AssociationRequests.h"
 
+#include "factory/ClassNames.h"
+
 #include <string>
 
 namespace Vorn::SensorProfileProvider {
 
 namespace {
+
+void returnAssociation(Answer answer, const CMPIResult* rslt, const CMPIObjectPath* op,
+    const CMPIInstance* association, CMPIStatus* status)
+{
+    if (answer == Answer::instances) {
+        CMReturnInstance(rslt, association);
+        return;
+    }
+    const CMPIObjectPath* const path = CMGetObjectPath(association, status);
+    if (!isUsable(path))
+        return;
+    copyNameSpace(path, op, status);
+    CMReturnObjectPath(rslt, path);
+}
 
 bool isOf(const CMPIData& element, CMPIType type)
 {
@@ -21,6 +37,24 @@ void AssociationRequest::failWithoutTarget(
     const std::string sentence = std::string(text) + '.';
     fail({sentence.c_str(), sentence.c_str(), text}, status, line);
     marks_.exit(line);
+}
+
+void AssociationRequest::returnReferences(Answer answer, const CMPIResult* rslt,
+    const CMPIObjectPath* op, const CMPIObjectPath* path, const CMPIObjectPath* target,
+    const std::vector<CMPIObjectPath*>& farEnds, CMPIStatus* status) const
+{
+    const bool leadsToSensors = isOfClass(target, SensorClass, status);
+    std::vector<CMPIInstance*> associations;
+    associations.reserve(farEnds.size());
+    forEachCounted(farEnds, [&](const CMPIObjectPath* farEnd) {
+        associations.push_back(newAssociation(broker_, path,
+            leadsToSensors ? served_.pair(farEnd, op) : served_.pair(op, farEnd), nullptr,
+            nullptr));
+    });
+    forEachCounted(associations, [&](const CMPIInstance* association) {
+        if (isUsable(association))
+            returnAssociation(answer, rslt, op, association, status);
+    });
 }
 
 void addReferenceKeys(const CMPIObjectPath* path, const References& references)
@@ -40,24 +74,6 @@ CMPIInstance* newAssociation(const CMPIBroker* broker, const CMPIObjectPath* pat
     for (const Reference& reference : references)
         CMSetProperty(instance, reference.role, &reference.path, CMPI_ref);
     return instance;
-}
-
-void returnAssociations(Answer answer, const CMPIResult* rslt, const CMPIObjectPath* op,
-    const std::vector<CMPIInstance*>& associations, CMPIStatus* status)
-{
-    forEachCounted(associations, [&](const CMPIInstance* association) {
-        if (!isUsable(association))
-            return;
-        if (answer == Answer::instances) {
-            CMReturnInstance(rslt, association);
-            return;
-        }
-        const CMPIObjectPath* const path = CMGetObjectPath(association, status);
-        if (!isUsable(path))
-            return;
-        copyNameSpace(path, op, status);
-        CMReturnObjectPath(rslt, path);
-    });
 }
 
 CMPIObjectPath* pathOf(const CMPIData& element)

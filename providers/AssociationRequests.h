@@ -26,6 +26,16 @@ struct Reference {
 };
 using References = std::array<Reference, 2>;
 
+// What one association class differs in from another.
+struct AssociationClass {
+    TraceModule module;
+    const char* provider; // the component of broker trace messages
+    const char* name;
+    bool isCap; // needs capabilities besides sensors
+    // The references of one association, in the order they are published in.
+    References (*pair)(const CMPIObjectPath* sensor, const CMPIObjectPath* other);
+};
+
 // How one failure reads for the client, in the broker's trace and in a message line.
 struct FailureTexts {
     const char* status;
@@ -37,19 +47,21 @@ struct FailureTexts {
 // lines it writes carry the caller's line.
 class AssociationRequest {
 public:
-    // `provider` is the component of broker trace messages. Writes the entry mark.
-    AssociationRequest(const TraceModule& module, const char* provider, const CMPIBroker* broker,
+    // Writes the entry mark of the function.
+    AssociationRequest(const AssociationClass& served, const CMPIBroker* broker,
         const char* function, unsigned line = __builtin_LINE())
-        : marks_(module, function), provider_(provider), broker_(broker)
+        : served_(served), broker_(broker), marks_(served.module, function)
     {
         marks_.entry(line);
     }
 
+    const AssociationClass& served() const { return served_; }
+    const CMPIBroker* broker() const { return broker_; }
     const HandlerMarks& marks() const { return marks_; }
 
     void fail(const FailureTexts& texts, CMPIStatus* status, unsigned line = __builtin_LINE()) const
     {
-        reportFailure(broker_, status, provider_, texts.status, texts.trace);
+        reportFailure(broker_, status, served_.provider, texts.status, texts.trace);
         if (texts.message)
             marks_.failure(texts.message, line);
     }
@@ -89,10 +101,43 @@ public:
         return {CMPI_RC_OK, nullptr};
     }
 
+    // Hands over one association for each far end, with the source at its other end, and ends
+    // the request. `fetch(factory, target, farEnds, status)` finds the far ends; it returns the
+    // text of its failure, null when there is none. `withoutTarget` is the failure of a source
+    // whose class has no far end.
+    template <typename Fetch>
+    CMPIStatus references(Answer answer, const CMPIResult* rslt, const CMPIObjectPath* op,
+        const char* withoutTarget, const Fetch& fetch, unsigned line = __builtin_LINE()) const
+    {
+        CMPIStatus status = {CMPI_RC_OK, nullptr};
+        SensorFactory factory(true, served_.isCap);
+        std::vector<CMPIObjectPath*> farEnds;
+        farEnds.reserve(factory.getNumberOfInstances());
+        const CMPIObjectPath* const target = SensorFactory::get_assoc_targetClass_ObjectPath(
+            broker_, op, served_.name, nullptr, &status);
+        if (!isUsable(target)) {
+            failWithoutTarget(withoutTarget, &status, line);
+            return status;
+        }
+        if (const CMPIObjectPath* const path = newPath(broker_, op, served_.name, &status)) {
+            if (const char* const failure = fetch(factory, target, farEnds, &status))
+                marks_.failure(failure, line);
+            else
+                returnReferences(answer, rslt, op, path, target, farEnds, &status);
+        }
+        marks_.exit(line);
+        return status;
+    }
+
 private:
-    HandlerMarks marks_;
-    const char* provider_;
+    // What the broker could not make is left out.
+    void returnReferences(Answer answer, const CMPIResult* rslt, const CMPIObjectPath* op,
+        const CMPIObjectPath* path, const CMPIObjectPath* target,
+        const std::vector<CMPIObjectPath*>& farEnds, CMPIStatus* status) const;
+
+    AssociationClass served_;
     const CMPIBroker* broker_;
+    HandlerMarks marks_;
 };
 
 // The association class that a request for associated objects names; the provider's own where
@@ -109,11 +154,6 @@ void addReferenceKeys(const CMPIObjectPath* path, const References& references);
 // when there is none.
 CMPIInstance* newAssociation(const CMPIBroker* broker, const CMPIObjectPath* path,
     const References& references, const char** properties, const char** keys);
-
-// Hands over the association instances, or their paths with the namespace of the request.
-// What the broker could not make is left out.
-void returnAssociations(Answer answer, const CMPIResult* rslt, const CMPIObjectPath* op,
-    const std::vector<CMPIInstance*>& associations, CMPIStatus* status);
 
 // Visits the elements of an up-call's answer until there are no more, `visit` returns false or
 // the broker fails: then the result is false and its status stands in `status`. No answer has no

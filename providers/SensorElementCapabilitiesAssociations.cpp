@@ -50,45 +50,14 @@ Failure fetchInstances(SensorFactory& factory, const CMPIObjectPath* op,
     return result ? SensorsFailed : nullptr;
 }
 
-// One association for each far end: the source stands where the far end does not.
-std::vector<CMPIInstance*> associate(const CMPIObjectPath* association, const CMPIObjectPath* op,
-    const CMPIObjectPath* target, const std::vector<CMPIObjectPath*>& farEnds, CMPIStatus* status)
-{
-    const bool leadsToSensors = isOfClass(target, SensorClass, status);
-    std::vector<CMPIInstance*> associations;
-    associations.reserve(farEnds.size());
-    forEachCounted(farEnds, [&](const CMPIObjectPath* farEnd) {
-        associations.push_back(newAssociation(broker, association,
-            {{{"ManagedElement", leadsToSensors ? farEnd : op},
-                {"Capabilities", leadsToSensors ? op : farEnd}}},
-            nullptr, nullptr));
-    });
-    return associations;
-}
-
 CMPIStatus references(const char* function, Answer answer, const CMPIResult* rslt,
     const CMPIObjectPath* op, const char* withoutTarget)
 {
-    const AssociationRequest request(module(), SensorElementCapabilitiesProvider, broker, function);
-    CMPIStatus status = {CMPI_RC_OK, nullptr};
-    SensorFactory factory(true, true);
-    std::vector<CMPIObjectPath*> farEnds;
-    farEnds.reserve(factory.getNumberOfInstances());
-    const CMPIObjectPath* const target = SensorFactory::get_assoc_targetClass_ObjectPath(
-        broker, op, SensorElementCapabilitiesClass, nullptr, &status);
-    if (!isUsable(target)) {
-        request.failWithoutTarget(withoutTarget, &status);
-        return status;
-    }
-    if (const Failure failure = fetchPaths(factory, op, target, farEnds, &status)) {
-        request.marks().failure(failure);
-    } else if (const CMPIObjectPath* const association =
-                   newPath(broker, op, SensorElementCapabilitiesClass, &status)) {
-        returnAssociations(
-            answer, rslt, op, associate(association, op, target, farEnds, &status), &status);
-    }
-    request.marks().exit();
-    return status;
+    const AssociationRequest request(served(), broker, function);
+    return request.references(answer, rslt, op, withoutTarget,
+        [op](SensorFactory& factory, const CMPIObjectPath* target,
+            std::vector<CMPIObjectPath*>& farEnds,
+            CMPIStatus* status) { return fetchPaths(factory, op, target, farEnds, status); });
 }
 
 } // namespace
@@ -97,8 +66,7 @@ CMPIStatus SensorElementCapabilities_Associators(CMPIAssociationMI*, const CMPIC
     const CMPIResult* rslt, const CMPIObjectPath* op, const char* assocClass,
     const char* resultClass, const char*, const char*, const char** properties)
 {
-    const AssociationRequest request(module(), SensorElementCapabilitiesProvider, broker,
-        "SensorElementCapabilities_Associators");
+    const AssociationRequest request(served(), broker, "SensorElementCapabilities_Associators");
     CMPIStatus status = {CMPI_RC_OK, nullptr};
     SensorFactory factory(true, true);
     std::vector<CMPIInstance*> instances;
@@ -121,8 +89,7 @@ CMPIStatus SensorElementCapabilities_AssociatorNames(CMPIAssociationMI*, const C
     const CMPIResult* rslt, const CMPIObjectPath* op, const char* assocClass,
     const char* resultClass, const char*, const char*)
 {
-    const AssociationRequest request(module(), SensorElementCapabilitiesProvider, broker,
-        "SensorElementCapabilities_AssociatorNames");
+    const AssociationRequest request(served(), broker, "SensorElementCapabilities_AssociatorNames");
     CMPIStatus status = {CMPI_RC_OK, nullptr};
     SensorFactory factory(true, true);
     std::vector<CMPIObjectPath*> paths;

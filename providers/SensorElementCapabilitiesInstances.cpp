@@ -3,7 +3,7 @@
 // The instances of ZUMLO_SensorElementCapabilities: each sensor with each capabilities instance.
 
 #include "factory/ClassNames.h"
-#include "providers/AssociationRequests.h"
+#include "providers/AssociationWalk.h"
 #include "providers/SensorElementCapabilities.h"
 
 #include <cstdint>
@@ -13,9 +13,6 @@ namespace Vorn::SensorProfileProvider {
 using namespace ElementCapabilities;
 
 namespace {
-
-// What the factory answers a fetch of paths with.
-constexpr int NothingFound = 1;
 
 // How the failures of a walk over all pairs are reported. The runs of blanks are part of the
 // texts.
@@ -51,19 +48,12 @@ constexpr PairFailures NameFailures = {
 enum class WalkEnd { complete, atSensors, atCapabilities, reported };
 
 // All pairs in order, sensor by sensor.
-class PairWalk {
+class PairWalk : public AssociationWalk {
 public:
     PairWalk(const AssociationRequest& request, const PairFailures& failures,
         const CMPIObjectPath* op, CMPIStatus* status)
-        : request_(request), failures_(failures), op_(op), status_(status)
+        : AssociationWalk(request, op, status), failures_(failures)
     {
-    }
-
-    // Makes room for one object for each sensor.
-    template <typename Object>
-    void reserve(std::vector<Object*>& objects)
-    {
-        objects.reserve(factory_.getNumberOfInstances());
     }
 
     // Calls `visit` with the association's path, without keys, and its references.
@@ -71,9 +61,7 @@ public:
     WalkEnd run(const Visit& visit)
     {
         std::vector<CMPIObjectPath*> sensors;
-        reserve(sensors);
-        result_ = factory_.getAllSensorCMPIObjPaths(broker, op_, sensors, status_);
-        if (result_ != 0)
+        if (!fetchSensors(sensors))
             return WalkEnd::atSensors;
         const auto count = static_cast<std::uint16_t>(sensors.size());
         for (std::uint16_t i = 0; i < count; ++i) {
@@ -84,50 +72,34 @@ public:
         return WalkEnd::complete;
     }
 
-    // What the factory answered at the end of the walk.
-    int factoryResult() const { return result_; }
-
 private:
     template <typename Visit>
-    WalkEnd walkCapabilities(CMPIObjectPath* sensor, const Visit& visit)
+    WalkEnd walkCapabilities(const CMPIObjectPath* sensor, const Visit& visit)
     {
         if (!isUsable(sensor))
             return report(failures_.sensor);
-        copyNameSpace(sensor, op_, status_);
+        copyNameSpace(sensor, op(), status());
         std::vector<CMPIObjectPath*> capabilities;
-        capabilities.reserve(1);
-        result_ = factory_.getAllSensorEnabledLogicalElementCapCMPIObjPaths(
-            broker, op_, capabilities, status_);
-        if (result_ != 0)
+        if (!fetchCapabilities(capabilities))
             return WalkEnd::atCapabilities;
         const auto count = static_cast<std::uint16_t>(capabilities.size());
         for (std::uint16_t i = 0; i < count; ++i) {
-            CMPIObjectPath* const path = capabilities.at(i);
+            const CMPIObjectPath* const path = capabilities.at(i);
             if (!isUsable(path))
                 return report(failures_.capabilities);
-            copyNameSpace(path, op_, status_);
-            copyNameSpace(sensor, op_, status_);
-            CMPIObjectPath* const association =
-                newPath(broker, op_, SensorElementCapabilitiesClass, status_);
-            if (association == nullptr)
-                return report(failures_.association);
-            visit(association, References{{{"ManagedElement", sensor}, {"Capabilities", path}}});
+            if (!visitPair(sensor, path, failures_.association, visit))
+                return WalkEnd::reported;
         }
         return WalkEnd::complete;
     }
 
     WalkEnd report(const FailureTexts& texts)
     {
-        request_.fail(texts, status_);
+        request().fail(texts, status());
         return WalkEnd::reported;
     }
 
-    const AssociationRequest& request_;
     const PairFailures& failures_;
-    const CMPIObjectPath* op_;
-    CMPIStatus* status_;
-    SensorFactory factory_{true, true};
-    int result_ = 0;
 };
 
 } // namespace
@@ -135,8 +107,7 @@ private:
 int sensorElementCapabilitiesCMPIInstances(
     const CMPIObjectPath* op, const char** properties, std::vector<CMPIInstance*>& out)
 {
-    const AssociationRequest request(module(), SensorElementCapabilitiesProvider, broker,
-        "sensorElementCapabilitiesCMPIInstances");
+    const AssociationRequest request(served(), broker, "sensorElementCapabilitiesCMPIInstances");
     CMPIStatus status = {CMPI_RC_OK, nullptr};
     PairWalk walk(request, InstanceFailures, op, &status);
     walk.reserve(out);
@@ -163,8 +134,8 @@ int sensorElementCapabilitiesCMPIInstances(
 CMPIStatus SensorElementCapabilities_EnumInstanceNames(
     CMPIInstanceMI*, const CMPIContext*, const CMPIResult* rslt, const CMPIObjectPath* op)
 {
-    const AssociationRequest request(module(), SensorElementCapabilitiesProvider, broker,
-        "SensorElementCapabilities_EnumInstanceNames");
+    const AssociationRequest request(
+        served(), broker, "SensorElementCapabilities_EnumInstanceNames");
     CMPIStatus status = {CMPI_RC_OK, nullptr};
     PairWalk walk(request, NameFailures, op, &status);
     const WalkEnd end =
@@ -176,7 +147,7 @@ CMPIStatus SensorElementCapabilities_EnumInstanceNames(
         request.marks().exit();
         return status;
     }
-    if (end != WalkEnd::complete && walk.factoryResult() != NothingFound)
+    if (end != WalkEnd::complete && !walk.foundNothing())
         return status; // without an exit mark
     request.marks().exit();
     CMReturnDone(rslt);
@@ -186,8 +157,7 @@ CMPIStatus SensorElementCapabilities_EnumInstanceNames(
 CMPIStatus SensorElementCapabilities_EnumInstances(CMPIInstanceMI*, const CMPIContext*,
     const CMPIResult* rslt, const CMPIObjectPath* op, const char** properties)
 {
-    const AssociationRequest request(module(), SensorElementCapabilitiesProvider, broker,
-        "SensorElementCapabilities_EnumInstances");
+    const AssociationRequest request(served(), broker, "SensorElementCapabilities_EnumInstances");
     return request.enumerateInstances(rslt, [&](std::vector<CMPIInstance*>& instances) {
         return sensorElementCapabilitiesCMPIInstances(op, properties, instances);
     });
@@ -196,8 +166,7 @@ CMPIStatus SensorElementCapabilities_EnumInstances(CMPIInstanceMI*, const CMPICo
 CMPIStatus SensorElementCapabilities_GetInstance(CMPIInstanceMI*, const CMPIContext*,
     const CMPIResult* rslt, const CMPIObjectPath* op, const char** properties)
 {
-    const AssociationRequest request(module(), SensorElementCapabilitiesProvider, broker,
-        "SensorElementCapabilities_GetInstance");
+    const AssociationRequest request(served(), broker, "SensorElementCapabilities_GetInstance");
     return request.getInstance(rslt, op, [&](std::vector<CMPIInstance*>& instances) {
         return sensorElementCapabilitiesCMPIInstances(op, properties, instances);
     });

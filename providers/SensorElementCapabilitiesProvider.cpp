@@ -2,6 +2,7 @@
 
 // The function tables and factories of the provider of ZUMLO_SensorElementCapabilities.
 
+#include "factory/ClassNames.h"
 #include "providers/NotSupported.h"
 #include "providers/SensorElementCapabilities.h"
 
@@ -17,9 +18,17 @@ const std::string loggerSensorElementCapabilities = "Nimbrel.SensorElementCapabi
 
 const CMPIBroker* ElementCapabilities::broker = nullptr;
 
-TraceModule ElementCapabilities::module()
+AssociationClass ElementCapabilities::served()
 {
-    return {loggerSensorElementCapabilities, "SensorElementCapabilitiesProvider"};
+    return {
+        .module = {loggerSensorElementCapabilities, "SensorElementCapabilitiesProvider"},
+        .provider = SensorElementCapabilitiesProvider,
+        .name = SensorElementCapabilitiesClass,
+        .isCap = true,
+        .pair = [](const CMPIObjectPath* sensor, const CMPIObjectPath* other) -> References {
+            return {{{"ManagedElement", sensor}, {"Capabilities", other}}};
+        },
+    };
 }
 
 namespace {

@@ -5,7 +5,7 @@
 
 #pragma once
 
-#include "include/TracedOperation.h"
+#include "providers/AssociationRequests.h"
 
 #include <cmpidt.h>
 
@@ -17,7 +17,7 @@ namespace SystemDevice {
 
 extern const CMPIBroker* broker; // written by the factories, before requests come
 
-TraceModule module();
+AssociationClass served();
 
 } // namespace SystemDevice
 

@@ -71,7 +71,7 @@ CMPIStatus associators(const char* function, Answer answer, const CMPIContext* c
     const char* resultClass, const char** properties)
 {
     constexpr CMPIStatus Ok = {CMPI_RC_OK, nullptr};
-    const AssociationRequest request(module(), SensorSystemDeviceProvider, broker, function);
+    const AssociationRequest request(served(), broker, function);
     CMPIStatus status = Ok;
     SensorFactory factory(true, false);
     const CMPIObjectPath* const target = SensorFactory::get_assoc_targetClass_ObjectPath(
@@ -120,46 +120,15 @@ const char* fetchFarEnds(const CMPIContext* ctx, const CMPIObjectPath* op,
     return isWhole ? nullptr : UpcallFailed;
 }
 
-// One association for each far end: the source stands where the far end does not.
-std::vector<CMPIInstance*> associate(const CMPIObjectPath* association, const CMPIObjectPath* op,
-    const CMPIObjectPath* target, const std::vector<CMPIObjectPath*>& farEnds, CMPIStatus* status)
-{
-    const bool leadsToSensors = isOfClass(target, SensorClass, status);
-    std::vector<CMPIInstance*> associations;
-    associations.reserve(farEnds.size());
-    forEachCounted(farEnds, [&](const CMPIObjectPath* farEnd) {
-        associations.push_back(newAssociation(broker, association,
-            {{{"GroupComponent", leadsToSensors ? op : farEnd},
-                {"PartComponent", leadsToSensors ? farEnd : op}}},
-            nullptr, nullptr));
-    });
-    return associations;
-}
-
 CMPIStatus references(const char* function, Answer answer, const CMPIContext* ctx,
     const CMPIResult* rslt, const CMPIObjectPath* op, const char* withoutTarget)
 {
-    const AssociationRequest request(module(), SensorSystemDeviceProvider, broker, function);
-    CMPIStatus status = {CMPI_RC_OK, nullptr};
-    SensorFactory factory(true, false);
-    std::vector<CMPIObjectPath*> farEnds;
-    farEnds.reserve(factory.getNumberOfInstances());
-    const CMPIObjectPath* const target = SensorFactory::get_assoc_targetClass_ObjectPath(
-        broker, op, SensorSystemDeviceClass, nullptr, &status);
-    if (!isUsable(target)) {
-        request.failWithoutTarget(withoutTarget, &status);
-        return status;
-    }
-    const CMPIObjectPath* const association = newPath(broker, op, SensorSystemDeviceClass, &status);
-    if (association != nullptr) {
-        if (const char* const failure = fetchFarEnds(ctx, op, target, factory, farEnds, &status))
-            request.marks().failure(failure);
-        else
-            returnAssociations(
-                answer, rslt, op, associate(association, op, target, farEnds, &status), &status);
-    }
-    request.marks().exit();
-    return status;
+    const AssociationRequest request(served(), broker, function);
+    return request.references(answer, rslt, op, withoutTarget,
+        [ctx, op](SensorFactory& factory, const CMPIObjectPath* target,
+            std::vector<CMPIObjectPath*>& farEnds, CMPIStatus* status) {
+            return fetchFarEnds(ctx, op, target, factory, farEnds, status);
+        });
 }
 
 } // namespace

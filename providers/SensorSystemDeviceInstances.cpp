@@ -3,7 +3,7 @@
 // The instances of ZUMLO_SensorSystemDevice: each computer system with each sensor.
 
 #include "factory/ClassNames.h"
-#include "providers/AssociationRequests.h"
+#include "providers/AssociationWalk.h"
 #include "providers/SensorSystemDevice.h"
 
 #include <cstdint>
@@ -13,9 +13,6 @@ namespace Vorn::SensorProfileProvider {
 using namespace SystemDevice;
 
 namespace {
-
-// What the factory answers a fetch of paths with.
-constexpr int NothingFound = 1;
 
 // How the failures of a walk over all pairs are reported. The runs of blanks are part of the
 // texts, and so are the classes they name.
@@ -46,19 +43,12 @@ constexpr PairFailures NameFailures = {
 enum class WalkEnd { complete, withoutSystemPath, atUpcall, atSystem, atSensors, reported };
 
 // All pairs in order, system by system.
-class PairWalk {
+class PairWalk : public AssociationWalk {
 public:
     PairWalk(const AssociationRequest& request, const PairFailures& failures,
         const CMPIContext* ctx, const CMPIObjectPath* op, CMPIStatus* status)
-        : request_(request), failures_(failures), ctx_(ctx), op_(op), status_(status)
+        : AssociationWalk(request, op, status), failures_(failures), ctx_(ctx)
     {
-    }
-
-    // Makes room for one object for each sensor.
-    template <typename Object>
-    void reserve(std::vector<Object*>& objects)
-    {
-        objects.reserve(factory_.getNumberOfInstances());
     }
 
     // Calls `visit` with the association's path, without keys, and its references.
@@ -67,15 +57,15 @@ public:
     {
         const CMPIObjectPath* const systemClass = newSystemPath();
         if (!isUsable(systemClass)) {
-            request_.fail(failures_.system, status_);
+            request().fail(failures_.system, status());
             return WalkEnd::withoutSystemPath;
         }
         const CMPIEnumeration* const systems =
-            CBEnumInstanceNames(broker, ctx_, systemClass, status_);
-        if (status_->rc != CMPI_RC_OK)
+            CBEnumInstanceNames(broker, ctx_, systemClass, status());
+        if (status()->rc != CMPI_RC_OK)
             return WalkEnd::atUpcall;
         WalkEnd end = WalkEnd::complete;
-        const bool isWhole = forEachElement(systems, status_, [&](const CMPIData& element) {
+        const bool isWhole = forEachElement(systems, status(), [&](const CMPIData& element) {
             if (const CMPIObjectPath* const system = pathOf(element))
                 end = walkSensors(system, visit);
             return end == WalkEnd::complete;
@@ -83,55 +73,36 @@ public:
         return isWhole ? end : WalkEnd::atSystem;
     }
 
-    // What the factory answered at the end of the walk.
-    int factoryResult() const { return result_; }
-
 private:
     CMPIObjectPath* newSystemPath() const
     {
-        const char* const nameSpace = nameSpaceOf(op_, status_);
+        const char* const nameSpace = nameSpaceOf(op(), status());
         if (nameSpace == nullptr || broker == nullptr)
             return nullptr;
-        return CMNewObjectPath(broker, nameSpace, ComputerSystemClass, status_);
+        return CMNewObjectPath(broker, nameSpace, ComputerSystemClass, status());
     }
 
     template <typename Visit>
     WalkEnd walkSensors(const CMPIObjectPath* system, const Visit& visit)
     {
         std::vector<CMPIObjectPath*> sensors;
-        reserve(sensors);
-        result_ = factory_.getAllSensorCMPIObjPaths(broker, op_, sensors, status_);
-        if (result_ != 0)
+        if (!fetchSensors(sensors))
             return WalkEnd::atSensors;
         const auto count = static_cast<std::uint16_t>(sensors.size());
         for (std::uint16_t i = 0; i < count; ++i) {
             const CMPIObjectPath* const sensor = sensors.at(i);
-            if (!isUsable(sensor))
-                return report(failures_.sensor);
-            copyNameSpace(sensor, op_, status_);
-            copyNameSpace(system, op_, status_);
-            CMPIObjectPath* const association =
-                newPath(broker, op_, SensorSystemDeviceClass, status_);
-            if (association == nullptr)
-                return report(failures_.association);
-            visit(association, References{{{"GroupComponent", system}, {"PartComponent", sensor}}});
+            if (!isUsable(sensor)) {
+                request().fail(failures_.sensor, status());
+                return WalkEnd::reported;
+            }
+            if (!visitPair(sensor, system, failures_.association, visit))
+                return WalkEnd::reported;
         }
         return WalkEnd::complete;
     }
 
-    WalkEnd report(const FailureTexts& texts)
-    {
-        request_.fail(texts, status_);
-        return WalkEnd::reported;
-    }
-
-    const AssociationRequest& request_;
     const PairFailures& failures_;
     const CMPIContext* ctx_;
-    const CMPIObjectPath* op_;
-    CMPIStatus* status_;
-    SensorFactory factory_{true, false};
-    int result_ = 0;
 };
 
 } // namespace
@@ -139,8 +110,7 @@ private:
 int sensorSystemDeviceCMPIInstances(const CMPIObjectPath* op, const char** properties,
     const CMPIContext* ctx, std::vector<CMPIInstance*>& out)
 {
-    const AssociationRequest request(
-        module(), SensorSystemDeviceProvider, broker, "sensorSystemDeviceCMPIInstances");
+    const AssociationRequest request(served(), broker, "sensorSystemDeviceCMPIInstances");
     CMPIStatus status = {CMPI_RC_OK, nullptr};
     PairWalk walk(request, InstanceFailures, ctx, op, &status);
     walk.reserve(out);
@@ -158,8 +128,7 @@ int sensorSystemDeviceCMPIInstances(const CMPIObjectPath* op, const char** prope
 CMPIStatus SensorSystemDevice_EnumInstanceNames(
     CMPIInstanceMI*, const CMPIContext* ctx, const CMPIResult* rslt, const CMPIObjectPath* op)
 {
-    const AssociationRequest request(
-        module(), SensorSystemDeviceProvider, broker, "SensorSystemDevice_EnumInstanceNames");
+    const AssociationRequest request(served(), broker, "SensorSystemDevice_EnumInstanceNames");
     CMPIStatus status = {CMPI_RC_OK, nullptr};
     PairWalk walk(request, NameFailures, ctx, op, &status);
     const WalkEnd end =
@@ -173,8 +142,8 @@ CMPIStatus SensorSystemDevice_EnumInstanceNames(
             broker, &status, CMPI_RC_OK, "CBEnumInstanceNames Failed for the ZUMLO_ComputerSystem");
         return status;
     }
-    const bool isAnswered = end == WalkEnd::complete ||
-                            (end == WalkEnd::atSensors && walk.factoryResult() == NothingFound);
+    const bool isAnswered =
+        end == WalkEnd::complete || (end == WalkEnd::atSensors && walk.foundNothing());
     if (isAnswered || end == WalkEnd::withoutSystemPath)
         request.marks().exit();
     if (isAnswered)
@@ -185,8 +154,7 @@ CMPIStatus SensorSystemDevice_EnumInstanceNames(
 CMPIStatus SensorSystemDevice_EnumInstances(CMPIInstanceMI*, const CMPIContext* ctx,
     const CMPIResult* rslt, const CMPIObjectPath* op, const char** properties)
 {
-    const AssociationRequest request(
-        module(), SensorSystemDeviceProvider, broker, "SensorSystemDevice_EnumInstances");
+    const AssociationRequest request(served(), broker, "SensorSystemDevice_EnumInstances");
     return request.enumerateInstances(rslt, [&](std::vector<CMPIInstance*>& instances) {
         return sensorSystemDeviceCMPIInstances(op, properties, ctx, instances);
     });
@@ -195,8 +163,7 @@ CMPIStatus SensorSystemDevice_EnumInstances(CMPIInstanceMI*, const CMPIContext* 
 CMPIStatus SensorSystemDevice_GetInstance(CMPIInstanceMI*, const CMPIContext* ctx,
     const CMPIResult* rslt, const CMPIObjectPath* op, const char** properties)
 {
-    const AssociationRequest request(
-        module(), SensorSystemDeviceProvider, broker, "SensorSystemDevice_GetInstance");
+    const AssociationRequest request(served(), broker, "SensorSystemDevice_GetInstance");
     return request.getInstance(rslt, op, [&](std::vector<CMPIInstance*>& instances) {
         return sensorSystemDeviceCMPIInstances(op, properties, ctx, instances);
     });

@@ -2,6 +2,7 @@
 
 // The function tables and factories of the provider of ZUMLO_SensorSystemDevice.
 
+#include "factory/ClassNames.h"
 #include "providers/NotSupported.h"
 #include "providers/SensorSystemDevice.h"
 
@@ -17,9 +18,17 @@ const std::string loggerSenosrSystemDeviceProvider = "Nimbrel.SenosrSystemDevice
 
 const CMPIBroker* SystemDevice::broker = nullptr;
 
-TraceModule SystemDevice::module()
+AssociationClass SystemDevice::served()
 {
-    return {loggerSenosrSystemDeviceProvider, "SensorSystemDeviceProvider"};
+    return {
+        .module = {loggerSenosrSystemDeviceProvider, "SensorSystemDeviceProvider"},
+        .provider = SensorSystemDeviceProvider,
+        .name = SensorSystemDeviceClass,
+        .isCap = false,
+        .pair = [](const CMPIObjectPath* sensor, const CMPIObjectPath* other) -> References {
+            return {{{"GroupComponent", other}, {"PartComponent", sensor}}};
+        },
+    };
 }
 
 namespace {

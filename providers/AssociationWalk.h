@@ -1,0 +1,80 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#pragma once
+
+#include "providers/AssociationRequests.h"
+
+#include <cmpidt.h>
+
+#include <vector>
+
+namespace Vorn::SensorProfileProvider {
+
+// What the walks over all pairs of an association share: the factory, the fetching of sensors
+// and the making of each pair's path.
+class AssociationWalk {
+public:
+    AssociationWalk(const AssociationRequest& request, const CMPIObjectPath* op, CMPIStatus* status)
+        : request_(request), op_(op), status_(status), factory_(true, request.served().isCap)
+    {
+    }
+
+    // Makes room for one object for each sensor.
+    template <typename Object>
+    void reserve(std::vector<Object*>& objects)
+    {
+        objects.reserve(factory_.getNumberOfInstances());
+    }
+
+    // Whether the factory ended the walk because there is nothing, not because it failed.
+    bool foundNothing() const { return result_ == NothingFound; }
+
+protected:
+    const AssociationRequest& request() const { return request_; }
+    const CMPIObjectPath* op() const { return op_; }
+    CMPIStatus* status() const { return status_; }
+
+    // False when there are none or the broker failed.
+    bool fetchSensors(std::vector<CMPIObjectPath*>& paths)
+    {
+        reserve(paths);
+        result_ = factory_.getAllSensorCMPIObjPaths(request_.broker(), op_, paths, status_);
+        return result_ == 0;
+    }
+    bool fetchCapabilities(std::vector<CMPIObjectPath*>& paths)
+    {
+        paths.reserve(1);
+        result_ = factory_.getAllSensorEnabledLogicalElementCapCMPIObjPaths(
+            request_.broker(), op_, paths, status_);
+        return result_ == 0;
+    }
+
+    // Calls `visit` with a new path of the association, without keys, and its references. False
+    // when the path cannot be made, which has been reported.
+    template <typename Visit>
+    bool visitPair(const CMPIObjectPath* sensor, const CMPIObjectPath* other,
+        const FailureTexts& withoutPath, const Visit& visit)
+    {
+        copyNameSpace(sensor, op_, status_);
+        copyNameSpace(other, op_, status_);
+        const CMPIObjectPath* const path =
+            newPath(request_.broker(), op_, request_.served().name, status_);
+        if (path == nullptr) {
+            request_.fail(withoutPath, status_);
+            return false;
+        }
+        visit(path, request_.served().pair(sensor, other));
+        return true;
+    }
+
+private:
+    static constexpr int NothingFound = 1; // of the factory's results
+
+    const AssociationRequest& request_;
+    const CMPIObjectPath* op_;
+    CMPIStatus* status_;
+    SensorFactory factory_;
+    int result_ = 0;
+};
+
+} // namespace Vorn::SensorProfileProvider
