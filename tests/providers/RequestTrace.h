@@ -14,7 +14,6 @@
 
 #include <gtest/gtest.h>
 
-#include <set>
 #include <string>
 #include <vector>
 
@@ -22,39 +21,13 @@ namespace Testing {
 
 using Lines = std::vector<std::string>;
 
-inline bool hasGivenLine(const LogLine& line)
-{
-    static const std::set<std::string> modules = {
-        "Nimbrel.SensorProfileProvider", "Nimbrel.SensorEnabledLogicalElementCapabilitiesProvider"};
-    static const std::set<std::string> operations = {"makeSensorInstance",
-        "makeSensorEnabledLogicalElementCapInstance",
-        "getAllSensorEnabledLogicalElementCapCMPIInstances",
-        "getOneSensorEnabledLogicalElementCapCMPIInstance",
-        "getAllSensorEnabledLogicalElementCapCMPIObjPaths", "get_assoc_targetClass_Name",
-        "get_assoc_targetClass_ObjectPath"};
-    return modules.contains(line.component) || operations.contains(line.function);
-}
-
 inline std::string place(const std::string& function, const std::string& file, unsigned line)
 {
     return " " + function + "(" + file + (line ? ":" + std::to_string(line) : "") + ") ";
 }
 
-inline std::string requestLine(const LogLine& line)
-{
-    static const std::regex number(R"(( \[Line: \d+\])|(, Line: \d+))");
-    static const std::regex names(R"(.*( _RefLeftClass=.*) rc=.*)");
-    const std::size_t end = line.text.find(",Parameters");
-    std::string text = line.text.substr(0, end);
-    if (!hasGivenLine(line))
-        text = std::regex_replace(text, number, "");
-    if (std::smatch found; std::regex_match(line.text, found, names))
-        text += found[1];
-    const bool hasPlace = hasGivenLine(line) || line.file == "Trace";
-    return line.component.substr(std::string("Nimbrel.").size()) + " " +
-           std::to_string(line.level) + place(line.function, line.file, hasPlace ? line.line : 0) +
-           text;
-}
+// One line as it was written.
+std::string requestLine(const LogLine& line);
 
 // What a request writes to both channels, but for the lines of the harvest.
 template <typename Request>

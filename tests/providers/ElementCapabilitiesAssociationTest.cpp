@@ -1,0 +1,281 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// What ZUMLO_SensorElementCapabilities leads to, from either end.
+
+#include "tests/providers/AssociationTest.h"
+
+#include <gmock/gmock.h>
+
+namespace {
+
+using namespace Testing;
+using ::testing::ElementsAre;
+using ::testing::IsEmpty;
+
+constexpr const char* Class = "ZUMLO_SensorElementCapabilities";
+constexpr const char* Provider = "SensorElementCapabilitiesProvider";
+const std::string Cap = CapabilitiesID;
+
+class ElementCapabilitiesAssociationTest : public AssociationTest {
+protected:
+    explicit ElementCapabilitiesAssociationTest(
+        const std::vector<ScriptedNode>& nodes = ThreeSensors)
+        : AssociationTest(SensorElementCapabilitiesProvider_Create_InstanceMI,
+              SensorElementCapabilitiesProvider_Create_AssociationMI, nodes, {"host"})
+    {
+    }
+
+    std::vector<std::string> pairs() const
+    {
+        return AssociationTest::pairs("ManagedElement", "Capabilities");
+    }
+
+    // That the request fails for lack of a target, with the text of its kind.
+    void expectNoTarget(const CMPIStatus& status, const std::string& text)
+    {
+        expectFailure(status, text);
+        expectNothing(false);
+        ASSERT_FALSE(messages_.empty());
+        EXPECT_EQ(messages_.back(), (BrokerMessage{2, Provider, text}));
+        messages_.clear();
+    }
+
+    void expectNoTargetFrom(const Host::ObjectPath& source, const Filter& filter = {})
+    {
+        expectNoTarget(associators(source, filter), "Object Path is NULL in Associators.");
+        expectNoTarget(associatorNames(source, filter), "Object Path is NULL in AssociatorsNames.");
+    }
+};
+
+class ElementCapabilitiesWithoutSensorsTest : public ElementCapabilitiesAssociationTest {
+protected:
+    ElementCapabilitiesWithoutSensorsTest() : ElementCapabilitiesAssociationTest({}) {}
+};
+
+// ---- Associators ----
+
+TEST_F(ElementCapabilitiesAssociationTest, aSensorIsAssociatedWithTheCapabilities)
+{
+    expectOk(associators(sensor("B:/2", "root/other"), {.associationClass = Class}));
+    ASSERT_EQ(answer_.instances().size(), 1U);
+    const Host::Instance& only = *answer_.instances()[0];
+    EXPECT_THAT(describe(only.properties()),
+        ElementsAre("InstanceID = string \"" + Cap + "\"",
+            "RequestedStatesSupported = [uint16 0, uint16 1, uint16 2]",
+            "ElementNameEditSupported = false"));
+    EXPECT_EQ(only.objectPath().toText(), capabilities("root/other").toText());
+    EXPECT_FALSE(answer_.isDone());
+    EXPECT_THAT(
+        messages_, ElementsAre(BrokerMessage{1, Provider, "Target Class is PhysicalPackageClass"}));
+}
+
+TEST_F(ElementCapabilitiesAssociationTest, capabilitiesAreAssociatedWithEverySensor)
+{
+    expectOk(associators(capabilities(), {.associationClass = Class}));
+    EXPECT_THAT(delivered(), ElementsAre("A:/1", "B:/2", "C:/3"));
+    EXPECT_EQ(answer_.instances().size(), 3U);
+    EXPECT_EQ(answer_.instances()[0]->properties().size(), 22U); // all but the six thresholds
+    EXPECT_FALSE(answer_.isDone());
+    EXPECT_THAT(
+        messages_, ElementsAre(BrokerMessage{1, Provider, "Target Class is ComputerSystemClass"}));
+}
+
+TEST_F(ElementCapabilitiesAssociationTest, associatorsHaveTheListedProperties)
+{
+    const char* sensorList[] = {"Name", nullptr};
+    expectOk(associators(capabilities(), {.properties = sensorList}));
+    ASSERT_EQ(answer_.instances().size(), 3U);
+    EXPECT_EQ(answer_.instances()[0]->properties().size(), 5U);
+    const char* capabilitiesList[] = {"RequestedStatesSupported", nullptr};
+    expectOk(associators(sensor("A:/1"), {.properties = capabilitiesList}));
+    ASSERT_EQ(answer_.instances().size(), 4U);
+    EXPECT_EQ(answer_.instances()[3]->properties().size(), 2U);
+}
+
+TEST_F(ElementCapabilitiesAssociationTest, associatorsAreWhole)
+{
+    expectOk(associators(capabilities()));
+    ASSERT_EQ(answer_.instances().size(), 3U);
+    for (const Host::Instance* const instance : answer_.instances())
+        EXPECT_GT(instance->properties().size(), 4U); // more than an object path needs
+}
+
+TEST_F(ElementCapabilitiesWithoutSensorsTest, associatorsOfCapabilitiesAreAnOpenEmptyAnswer)
+{
+    expectOk(associators(capabilities()));
+    expectNothing(false);
+    expectOk(associators(sensor("A:/1"))); // the source need not exist
+    EXPECT_THAT(delivered(), ElementsAre(Cap));
+}
+
+// ---- AssociatorNames ----
+
+TEST_F(ElementCapabilitiesAssociationTest, namesOfAssociatorsAreThePathsOfTheFarEnds)
+{
+    expectOk(associatorNames(sensor("A:/1", "root/other"), {.associationClass = Class}));
+    ASSERT_EQ(answer_.paths().size(), 1U);
+    EXPECT_EQ(answer_.paths()[0]->toText(), capabilities("root/other").toText());
+    expectOk(associatorNames(capabilities("root/other"), {.associationClass = Class}));
+    ASSERT_EQ(answer_.paths().size(), 4U);
+    EXPECT_THAT(delivered(), ElementsAre(Cap, "A:/1", "B:/2", "C:/3"));
+    EXPECT_EQ(answer_.paths()[2]->toText(), sensor("B:/2", "root/other").toText());
+    EXPECT_FALSE(answer_.isDone());
+}
+
+TEST_F(ElementCapabilitiesWithoutSensorsTest, namesOfAssociatorsAreAnOpenEmptyAnswer)
+{
+    expectOk(associatorNames(capabilities()));
+    expectNothing(false);
+}
+
+// ---- What narrows an answer and what does not ----
+
+TEST_F(ElementCapabilitiesAssociationTest, noFilterButTheAssociationClassTakesPart)
+{
+    const Filter filter = {Class, "NOT_AClass", "Nobody", "Nowhere", nullptr};
+    expectOk(associators(sensor("A:/1"), filter));
+    expectOk(associatorNames(sensor("A:/1"), filter));
+    expectOk(associators(
+        sensor("A:/1"), {Class, CapabilitiesClass, "Capabilities", "ManagedElement", nullptr}));
+    EXPECT_THAT(delivered(), ElementsAre(Cap, Cap, Cap));
+    expectOk(references(sensor("A:/1"), filter));
+    expectOk(referenceNames(sensor("A:/1"), filter));
+    EXPECT_EQ(answer_.instances().size(), 3U);
+    EXPECT_EQ(answer_.paths().size(), 2U);
+}
+
+TEST_F(ElementCapabilitiesAssociationTest, theSourcesKeysDoNotMatter)
+{
+    expectOk(associatorNames(path(SensorClass)));
+    expectOk(associatorNames(path(CapabilitiesClass, {{"InstanceID", "other"}})));
+    EXPECT_THAT(delivered(), ElementsAre(Cap, "A:/1", "B:/2", "C:/3"));
+}
+
+TEST_F(ElementCapabilitiesAssociationTest, keysOfOtherTypesDoNotMatterEither)
+{
+    Host::ObjectPath& element = path(SensorClass);
+    element.addKey("DeviceID", Host::Value::integer(CMPI_uint64, 7));
+    Host::ObjectPath& capability = path(CapabilitiesClass);
+    capability.addKey("InstanceID", Host::Value::of(element));
+    expectOk(associators(element));
+    expectOk(associatorNames(capability));
+    EXPECT_EQ(answer_.instances().size(), 1U);
+    EXPECT_EQ(answer_.paths().size(), 3U);
+    expectOk(references(element));
+    expectOk(referenceNames(capability));
+    EXPECT_EQ(answer_.instances().size(), 2U);
+    EXPECT_EQ(answer_.paths().size(), 6U);
+}
+
+TEST_F(ElementCapabilitiesAssociationTest, anAbsentAssociationClassIsTheProvidersOwn)
+{
+    expectOk(associators(sensor("A:/1")));
+    expectOk(associatorNames(capabilities()));
+    EXPECT_EQ(answer_.instances().size(), 1U);
+    EXPECT_EQ(answer_.paths().size(), 3U);
+}
+
+// A target of a class that this provider does not lead to.
+TEST_F(ElementCapabilitiesAssociationTest, theOtherAssociationOfASensorLeadsNowhere)
+{
+    expectOk(associators(sensor("A:/1"), {.associationClass = "ZUMLO_SensorSystemDevice"}));
+    expectOk(associatorNames(sensor("A:/1"), {.associationClass = "ZUMLO_SensorSystemDevice"}));
+    expectNothing(false);
+    EXPECT_TRUE(systems_.calls.empty());
+    EXPECT_THAT(messages_,
+        ElementsAre(
+            BrokerMessage{1, "SensorSystemDeviceProvider", "Target Class is ComputerSystemClass"},
+            BrokerMessage{1, "SensorSystemDeviceProvider", "Target Class is ComputerSystemClass"}));
+}
+
+TEST_F(ElementCapabilitiesAssociationTest, theOtherAssociationOfASystemLeadsToTheSensors)
+{
+    expectOk(associatorNames(system("host"), {.associationClass = "ZUMLO_SensorSystemDevice"}));
+    EXPECT_THAT(delivered(), ElementsAre("A:/1", "B:/2", "C:/3"));
+}
+
+TEST_F(ElementCapabilitiesAssociationTest, anotherAssociationClassHasNoTarget)
+{
+    for (const char* const other : {"zumlo_sensorelementcapabilities",
+             "ZUMLO_SENSORELEMENTCAPABILITIES", "CIM_ElementCapabilities", ""})
+        expectNoTargetFrom(sensor("A:/1"), {.associationClass = other});
+}
+
+TEST_F(ElementCapabilitiesAssociationTest, anotherSourceHasNoTarget)
+{
+    for (Host::ObjectPath* const source :
+        {&system("host"), &path("zumlo_numericsensor"), &path(Class)}) {
+        expectNoTargetFrom(*source);
+        expectNoTarget(references(*source), "Object Path is NULL in References.");
+        expectNoTarget(referenceNames(*source), "Object Path is NULL in ReferenceNames.");
+    }
+}
+
+TEST_F(ElementCapabilitiesAssociationTest, aMissingTargetHasNoMessageWithoutABroker)
+{
+    SensorElementCapabilitiesProvider_Create_InstanceMI(nullptr, nullptr, nullptr);
+    for (const CMPIStatus& status : {associators(sensor("A:/1")), associatorNames(sensor("A:/1")),
+             references(sensor("A:/1")), referenceNames(sensor("A:/1"))}) {
+        EXPECT_EQ(status.rc, CMPI_RC_ERR_FAILED);
+        EXPECT_EQ(status.msg, nullptr);
+    }
+    EXPECT_THAT(messages_, IsEmpty());
+}
+
+// ---- References ----
+
+TEST_F(ElementCapabilitiesAssociationTest, referencesOfASensorPairItWithTheCapabilities)
+{
+    const Host::ObjectPath& source = sensor("B:/2", "root/other");
+    const char* properties[] = {"Nothing", nullptr};
+    expectOk(references(source, {.properties = properties}));
+    ASSERT_EQ(answer_.instances().size(), 1U);
+    const Host::Instance& only = *answer_.instances()[0];
+    EXPECT_THAT(describe(only.properties()), // the list does not narrow it
+        ElementsAre("ManagedElement = ref " + source.toText(),
+            "Capabilities = ref " + capabilities("root/other").toText()));
+    EXPECT_EQ(only.className(), Class);
+    EXPECT_EQ(only.objectPath().nameSpace(), "root/other");
+    EXPECT_EQ(only.objectPath().host(), systemName_);
+    EXPECT_FALSE(answer_.isDone());
+    EXPECT_THAT(
+        messages_, ElementsAre(BrokerMessage{1, Provider, "Target Class is PhysicalPackageClass"}));
+}
+
+TEST_F(ElementCapabilitiesAssociationTest, referencesOfCapabilitiesPairThemWithEverySensor)
+{
+    const Host::ObjectPath& source = path(CapabilitiesClass, {{"InstanceID", "as it came"}});
+    expectOk(references(source));
+    EXPECT_THAT(pairs(), ElementsAre("A:/1 as it came", "B:/2 as it came", "C:/3 as it came"));
+    ASSERT_EQ(answer_.instances().size(), 3U);
+    EXPECT_THAT(describe(answer_.instances()[0]->properties()),
+        ElementsAre("ManagedElement = ref " + sensor("A:/1").toText(),
+            "Capabilities = ref " + source.toText()));
+    EXPECT_FALSE(answer_.isDone());
+}
+
+TEST_F(ElementCapabilitiesAssociationTest, namesOfReferencesAreThePathsOfTheSamePairs)
+{
+    expectOk(referenceNames(capabilities("root/other")));
+    expectOk(referenceNames(sensor("D:/4", "root/other")));
+    EXPECT_THAT(pairs(), ElementsAre("A:/1 " + Cap, "B:/2 " + Cap, "C:/3 " + Cap, "D:/4 " + Cap));
+    EXPECT_TRUE(answer_.instances().empty());
+    for (const Host::ObjectPath* const each : answer_.paths()) {
+        EXPECT_EQ(each->className(), Class);
+        EXPECT_EQ(each->nameSpace(), "root/other");
+        EXPECT_EQ(each->host(), systemName_);
+        EXPECT_EQ(each->keys().size(), 2U);
+    }
+    EXPECT_FALSE(answer_.isDone());
+}
+
+TEST_F(ElementCapabilitiesWithoutSensorsTest, referencesOfCapabilitiesAreAnOpenEmptyAnswer)
+{
+    expectOk(references(capabilities()));
+    expectOk(referenceNames(capabilities()));
+    expectNothing(false);
+    expectOk(referenceNames(sensor("A:/1")));
+    EXPECT_THAT(pairs(), ElementsAre("A:/1 " + Cap));
+}
+
+} // namespace

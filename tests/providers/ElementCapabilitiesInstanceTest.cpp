@@ -1,0 +1,321 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// The instances of ZUMLO_SensorElementCapabilities: each sensor with each capabilities instance.
+
+#include "providers/SensorElementCapabilities.h"
+#include "tests/providers/AssociationTest.h"
+
+#include <gmock/gmock.h>
+
+namespace {
+
+using namespace Testing;
+using ::testing::ElementsAre;
+using ::testing::IsEmpty;
+
+constexpr const char* Class = "ZUMLO_SensorElementCapabilities";
+constexpr const char* Provider = "SensorElementCapabilitiesProvider";
+constexpr const char* NoKeyText = "At least one key should be passed";
+const std::string Cap = CapabilitiesID;
+
+class ElementCapabilitiesInstanceTest : public AssociationTest {
+protected:
+    explicit ElementCapabilitiesInstanceTest(const std::vector<ScriptedNode>& nodes = ThreeSensors)
+        : AssociationTest(SensorElementCapabilitiesProvider_Create_InstanceMI,
+              SensorElementCapabilitiesProvider_Create_AssociationMI, nodes, {})
+    {
+    }
+
+    // A path of the association with any values for its keys.
+    Host::ObjectPath& pairPath(const Host::Value& element, const Host::Value& capabilities)
+    {
+        Host::ObjectPath& made = path(Class);
+        made.addKey("ManagedElement", element);
+        made.addKey("Capabilities", capabilities);
+        return made;
+    }
+
+    Host::ObjectPath& pairPath(const Host::ObjectPath& element, const Host::ObjectPath& capability)
+    {
+        return pairPath(Host::Value::of(element), Host::Value::of(capability));
+    }
+
+    std::vector<std::string> pairs() const
+    {
+        return AssociationTest::pairs("ManagedElement", "Capabilities");
+    }
+
+    // GetInstance with a result of its own.
+    std::vector<std::string> got(const Host::ObjectPath& ref)
+    {
+        Host::CollectedResult found;
+        Host::Result into(found);
+        expectOk(instanceMI_->ft->getInstance(
+            instanceMI_, context(), into.handle(), ref.handle(), nullptr));
+        EXPECT_TRUE(found.isDone());
+        std::vector<std::string> elements;
+        for (const Host::Instance* const instance : found.instances())
+            elements.push_back(nameOf(*instance->property("ManagedElement")->path()));
+        return elements;
+    }
+};
+
+class ElementCapabilitiesOfOneSensorTest : public ElementCapabilitiesInstanceTest {
+protected:
+    ElementCapabilitiesOfOneSensorTest() : ElementCapabilitiesInstanceTest({ThreeSensors[0]}) {}
+};
+
+class ElementCapabilitiesOfNoSensorTest : public ElementCapabilitiesInstanceTest {
+protected:
+    ElementCapabilitiesOfNoSensorTest() : ElementCapabilitiesInstanceTest({}) {}
+};
+
+// ---- EnumInstanceNames ----
+
+TEST_F(ElementCapabilitiesInstanceTest, namesArePairsOfEachSensorInOrder)
+{
+    expectOk(enumerateNames(path(Class)));
+    EXPECT_THAT(pairs(), ElementsAre("A:/1 " + Cap, "B:/2 " + Cap, "C:/3 " + Cap));
+    EXPECT_TRUE(answer_.isDone());
+    EXPECT_THAT(messages_, IsEmpty());
+}
+
+TEST_F(ElementCapabilitiesInstanceTest, aNameIsAPathInTheRequestsNamespaceOnThisSystem)
+{
+    expectOk(enumerateNames(path(Class, {}, "root/other")));
+    ASSERT_EQ(answer_.paths().size(), 3U);
+    const Host::ObjectPath& second = *answer_.paths()[1];
+    EXPECT_EQ(second.className(), Class);
+    EXPECT_EQ(second.nameSpace(), "root/other");
+    EXPECT_EQ(second.host(), systemName_);
+    EXPECT_THAT(describe(second.keys()),
+        ElementsAre("ManagedElement = ref " + sensor("B:/2", "root/other").toText(),
+            "Capabilities = ref " + capabilities("root/other").toText()));
+}
+
+TEST_F(ElementCapabilitiesOfOneSensorTest, hasOneName)
+{
+    expectOk(enumerateNames(path(Class)));
+    EXPECT_THAT(pairs(), ElementsAre("C:/3 " + Cap));
+}
+
+TEST_F(ElementCapabilitiesOfNoSensorTest, hasNoNamesInAClosedResult)
+{
+    expectOk(enumerateNames(path(Class)));
+    expectNothing(true);
+    EXPECT_THAT(messages_,
+        ElementsAre(BrokerMessage{1, "SensorProfileProvider", "***No instance found***"}));
+}
+
+// ---- EnumInstances ----
+
+TEST_F(ElementCapabilitiesInstanceTest, instancesArePairsOfEachSensorInOrder)
+{
+    expectOk(enumerate(path(Class, {}, "root/other")));
+    EXPECT_THAT(pairs(), ElementsAre("A:/1 " + Cap, "B:/2 " + Cap, "C:/3 " + Cap));
+    const Host::Instance& third = *answer_.instances()[2];
+    EXPECT_EQ(third.className(), Class);
+    EXPECT_EQ(third.objectPath().nameSpace(), "root/other");
+    EXPECT_EQ(third.objectPath().host(), systemName_);
+    EXPECT_THAT(describe(third.properties()),
+        ElementsAre("ManagedElement = ref " + sensor("C:/3", "root/other").toText(),
+            "Capabilities = ref " + capabilities("root/other").toText()));
+    EXPECT_TRUE(answer_.isDone());
+    EXPECT_THAT(messages_, IsEmpty());
+}
+
+TEST_F(ElementCapabilitiesOfNoSensorTest, hasNoInstancesInAClosedResult)
+{
+    expectOk(enumerate(path(Class)));
+    expectNothing(true);
+    EXPECT_THAT(
+        messages_, ElementsAre(BrokerMessage{1, "SensorProfileProvider", "***No instance found***"},
+                       BrokerMessage{2, Provider,
+                           "***Can't get Sensor ObjectPaths." + std::string(13, ' ') +
+                               "Exiting EnumerateInstanceNames***"}));
+}
+
+// The broker that knows the class keeps its keys whatever the filter says.
+TEST_F(ElementCapabilitiesInstanceTest, aPropertyListKeepsTheKeysOfAClassThatIsKnown)
+{
+    const char* properties[] = {"Characteristics", nullptr};
+    expectOk(enumerate(path(Class), properties));
+    ASSERT_EQ(answer_.instances().size(), 3U);
+    EXPECT_THAT(namesOf(answer_.instances()[0]->properties()),
+        ElementsAre("ManagedElement", "Capabilities"));
+}
+
+// The filter's own keys are no properties of the class.
+TEST_F(ElementCapabilitiesInstanceTest, aPropertyListDecidesWhereTheClassIsNotKnown)
+{
+    broker_.setClassInformation(nullptr);
+    const char* properties[] = {"Capabilities", nullptr};
+    expectOk(enumerate(path(Class), properties));
+    ASSERT_EQ(answer_.instances().size(), 3U);
+    for (const Host::Instance* const instance : answer_.instances())
+        EXPECT_THAT(namesOf(instance->properties()), ElementsAre("Capabilities"));
+}
+
+TEST_F(ElementCapabilitiesInstanceTest, theFilterNamesAntecedentAndDependentAsKeys)
+{
+    static std::vector<std::string> keys;
+    static CMPIInstanceFT watching;
+    keys.clear();
+    watching = Host::Instance::functions;
+    watching.setPropertyFilter = [](const CMPIInstance*, const char**, const char** names) {
+        for (; *names != nullptr; ++names)
+            keys.emplace_back(*names);
+        return CMPIStatus{CMPI_RC_OK, nullptr};
+    };
+    CMPIBrokerEncFT functions = *broker()->eft;
+    static const CMPIBrokerEncFT* real;
+    real = broker()->eft;
+    functions.newInstance = [](const CMPIBroker* handle, const CMPIObjectPath* at, CMPIStatus* rc) {
+        CMPIInstance* const made = real->newInstance(handle, at, rc);
+        made->ft = &watching;
+        return made;
+    };
+    CMPIBroker watched = *broker();
+    watched.eft = &functions;
+    SensorElementCapabilitiesProvider_Create_InstanceMI(&watched, nullptr, nullptr);
+    expectOk(enumerate(path(Class)));
+    EXPECT_THAT(keys, ElementsAre("Antecedent", "Dependent", "Antecedent", "Dependent",
+                          "Antecedent", "Dependent"));
+}
+
+TEST_F(ElementCapabilitiesInstanceTest, theBuilderKeepsWhatIsThereAndSaysWhetherItFailed)
+{
+    std::vector<CMPIInstance*> instances = {nullptr};
+    using Vorn::SensorProfileProvider::sensorElementCapabilitiesCMPIInstances;
+    EXPECT_EQ(sensorElementCapabilitiesCMPIInstances(path(Class).handle(), nullptr, instances), 0);
+    EXPECT_EQ(instances.size(), 4U);
+    EXPECT_EQ(instances[0], nullptr);
+    const ScriptedMachine empty;
+    EXPECT_EQ(sensorElementCapabilitiesCMPIInstances(path(Class).handle(), nullptr, instances), 1);
+    EXPECT_EQ(instances.size(), 4U);
+}
+
+// ---- GetInstance ----
+
+TEST_F(ElementCapabilitiesInstanceTest, anInstanceIsFoundByItsReferences)
+{
+    expectOk(get(pairPath(sensor("B:/2"), capabilities())));
+    EXPECT_THAT(pairs(), ElementsAre("B:/2 " + Cap));
+    EXPECT_TRUE(answer_.isDone());
+    EXPECT_THAT(messages_, IsEmpty());
+}
+
+TEST_F(ElementCapabilitiesInstanceTest, anInstanceIsFoundWithAPropertyListToo)
+{
+    const char* properties[] = {"Capabilities", nullptr};
+    expectOk(get(pairPath(sensor("B:/2"), capabilities()), properties));
+    EXPECT_THAT(pairs(), ElementsAre("B:/2 " + Cap));
+}
+
+TEST_F(ElementCapabilitiesInstanceTest, theOrderOfTheKeysDoesNotMatter)
+{
+    Host::ObjectPath& ref = path(Class);
+    ref.addKey("Capabilities", Host::Value::of(capabilities()));
+    ref.addKey("ManagedElement",
+        Host::Value::of(path(SensorClass,
+            {{"SystemName", systemName_}, {"DeviceID", "C:/3"},
+                {"SystemCreationClassName", SystemClass}, {"CreationClassName", SensorClass}})));
+    EXPECT_THAT(got(ref), ElementsAre("C:/3"));
+}
+
+TEST_F(ElementCapabilitiesInstanceTest, theLetterCaseOfNamesDoesNotMatter)
+{
+    Host::ObjectPath& ref = path("zumlo_sensorelementcapabilities");
+    ref.addKey("MANAGEDELEMENT",
+        Host::Value::of(path("zumlo_numericsensor",
+            {{"creationclassname", SensorClass}, {"deviceid", "A:/1"},
+                {"systemcreationclassname", SystemClass}, {"systemname", systemName_}})));
+    ref.addKey("capabilities", Host::Value::of(path("ZUMLO_SENSORENABLEDLOGICALELEMENTCAPABILITIES",
+                                   {{"INSTANCEID", CapabilitiesID}}, "ROOT/CIMV2")));
+    EXPECT_THAT(got(ref), ElementsAre("A:/1"));
+}
+
+TEST_F(ElementCapabilitiesInstanceTest, hostsAndAbsentNamespacesDoNotMatter)
+{
+    for (const char* const host : {static_cast<const char*>(nullptr), "elsewhere"})
+        for (const char* const nameSpace : {static_cast<const char*>(nullptr), NameSpace}) {
+            Host::ObjectPath& element = sensor("A:/1");
+            Host::ObjectPath& capability = capabilities();
+            for (Host::ObjectPath* const end : {&element, &capability}) {
+                end->setHost(host);
+                end->setNameSpace(nameSpace);
+            }
+            Host::ObjectPath& ref = pairPath(element, capability);
+            ref.setHost(host);
+            EXPECT_THAT(got(ref), ElementsAre("A:/1"));
+        }
+}
+
+TEST_F(ElementCapabilitiesInstanceTest, otherValuesAreAClosedEmptyAnswer)
+{
+    EXPECT_THAT(got(pairPath(sensor("a:/1"), capabilities())), IsEmpty());
+    EXPECT_THAT(got(pairPath(sensor("D:/4"), capabilities())), IsEmpty());
+    EXPECT_THAT(got(pairPath(sensor("A:/1", "root/other"), capabilities())), IsEmpty());
+    EXPECT_THAT(got(pairPath(sensor("A:/1"), path(CapabilitiesClass, {{"InstanceID", "other"}}))),
+        IsEmpty());
+    EXPECT_THAT(got(pairPath(capabilities(), sensor("A:/1"))), IsEmpty());
+    EXPECT_THAT(got(path(Class, {{"Other", "x"}})), IsEmpty());
+    EXPECT_THAT(messages_, IsEmpty());
+}
+
+TEST_F(ElementCapabilitiesInstanceTest, oneReferenceAloneOrOneTooManyFindsNothing)
+{
+    Host::ObjectPath& half = path(Class);
+    half.addKey("ManagedElement", Host::Value::of(sensor("A:/1")));
+    EXPECT_THAT(got(half), IsEmpty());
+    Host::ObjectPath& more = pairPath(sensor("A:/1"), capabilities());
+    more.addKey("Other", Host::Value::text(request_->arena(), "x"));
+    EXPECT_THAT(got(more), IsEmpty());
+}
+
+TEST_F(ElementCapabilitiesInstanceTest, aReferenceOfAnotherTypeFindsNothing)
+{
+    Host::Arena& arena = request_->arena();
+    const Host::Value good = Host::Value::of(capabilities());
+    for (const Host::Value& value : {Host::Value::text(arena, sensor("A:/1").toText()),
+             Host::Value::integer(CMPI_uint64, 1), Host::Value::integer(CMPI_sint64, 1),
+             Host::Value::boolean(true), Host::Value::null(CMPI_ref), Host::Value::absent()})
+        EXPECT_THAT(got(pairPath(value, good)), IsEmpty());
+    Host::ObjectPath& element = path(
+        SensorClass, {{"CreationClassName", SensorClass}, {"SystemCreationClassName", SystemClass},
+                         {"SystemName", systemName_}});
+    element.addKey("DeviceID", Host::Value::integer(CMPI_uint64, 1));
+    EXPECT_THAT(got(pairPath(element, capabilities())), IsEmpty());
+}
+
+TEST_F(ElementCapabilitiesInstanceTest, aPathWithoutKeysIsRefusedInAClosedResult)
+{
+    expectFailure(get(path(Class)), NoKeyText);
+    expectNothing(true);
+    EXPECT_THAT(messages_, ElementsAre(BrokerMessage{2, Provider, NoKeyText}));
+}
+
+TEST_F(ElementCapabilitiesInstanceTest, aRefusalHasNoMessageWithoutABroker)
+{
+    SensorElementCapabilitiesProvider_Create_AssociationMI(nullptr, nullptr, nullptr);
+    const CMPIStatus status = get(path(Class));
+    EXPECT_EQ(status.rc, CMPI_RC_ERR_FAILED);
+    EXPECT_EQ(status.msg, nullptr);
+    EXPECT_THAT(messages_, IsEmpty());
+    EXPECT_TRUE(answer_.isDone());
+}
+
+TEST_F(ElementCapabilitiesOfNoSensorTest, findsNoInstance)
+{
+    EXPECT_THAT(got(pairPath(sensor("A:/1"), capabilities())), IsEmpty());
+}
+
+TEST_F(ElementCapabilitiesInstanceTest, everyNameThatIsEnumeratedCanBeFetched)
+{
+    expectOk(enumerateNames(path(Class)));
+    ASSERT_EQ(answer_.paths().size(), 3U);
+    for (const Host::ObjectPath* const name : answer_.paths())
+        EXPECT_THAT(got(*name), ElementsAre(nameOf(*name->key("ManagedElement")->path())));
+}
+
+} // namespace

@@ -1,0 +1,192 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// The trace lines of whole requests of ZUMLO_SensorElementCapabilities, line by line.
+
+#include "tests/providers/AssociationTest.h"
+#include "tests/providers/RequestTrace.h"
+
+#include <gmock/gmock.h>
+
+namespace {
+
+using namespace Testing;
+using ::testing::ElementsAreArray;
+
+constexpr const char* Class = "ZUMLO_SensorElementCapabilities";
+
+HandlerLines handler(const std::string& function)
+{
+    return {"SensorElementCapabilities", "SensorElementCapabilitiesProvider", function};
+}
+
+const HandlerLines Builder = handler("sensorElementCapabilitiesCMPIInstances");
+const Lines Built = builtFactory({"_createSensorMap", "_createEnabledLogicalElementCapMap"});
+const Lines BuiltWithoutSensors = builtFactory({"_createEnabledLogicalElementCapMap"});
+const Lines SensorPaths = operation("getAllSensorCMPIObjPaths");
+const Lines CapPaths = operation("getAllSensorEnabledLogicalElementCapCMPIObjPaths", 1041, 1093);
+
+class ElementCapabilitiesTraceTest : public AssociationTest {
+protected:
+    explicit ElementCapabilitiesTraceTest(
+        const std::vector<ScriptedNode>& nodes = {ThreeSensors[0], ThreeSensors[1]})
+        : AssociationTest(SensorElementCapabilitiesProvider_Create_InstanceMI,
+              SensorElementCapabilitiesProvider_Create_AssociationMI, nodes, {})
+    {
+    }
+};
+
+class ElementCapabilitiesEmptyTraceTest : public ElementCapabilitiesTraceTest {
+protected:
+    ElementCapabilitiesEmptyTraceTest() : ElementCapabilitiesTraceTest({}) {}
+};
+
+// ---- Instances ----
+
+// The capabilities are fetched anew for each of the two sensors.
+TEST_F(ElementCapabilitiesTraceTest, ofEnumeratedNames)
+{
+    const HandlerLines lines = handler("SensorElementCapabilities_EnumInstanceNames");
+    const Host::ObjectPath& ref = path(Class);
+    EXPECT_THAT(traceOf([&] { enumerateNames(ref); }),
+        ElementsAreArray(sequence(
+            {lines.entry(), Built, counted(), SensorPaths, CapPaths, CapPaths, lines.exit()})));
+}
+
+TEST_F(ElementCapabilitiesEmptyTraceTest, ofNamesWithoutSensors)
+{
+    const HandlerLines lines = handler("SensorElementCapabilities_EnumInstanceNames");
+    const Host::ObjectPath& ref = path(Class);
+    EXPECT_THAT(traceOf([&] { enumerateNames(ref); }),
+        ElementsAreArray(
+            sequence({lines.entry(), BuiltWithoutSensors, counted(), SensorPaths, lines.exit()})));
+}
+
+TEST_F(ElementCapabilitiesTraceTest, ofEnumeratedInstances)
+{
+    const HandlerLines lines = handler("SensorElementCapabilities_EnumInstances");
+    const Host::ObjectPath& ref = path(Class);
+    EXPECT_THAT(traceOf([&] { enumerate(ref); }),
+        ElementsAreArray(sequence({lines.entry(), Builder.entry(), Built, counted(), counted(),
+            SensorPaths, CapPaths, CapPaths, Builder.exit(), lines.exit()})));
+}
+
+TEST_F(ElementCapabilitiesEmptyTraceTest, ofInstancesWithoutSensors)
+{
+    const HandlerLines lines = handler("SensorElementCapabilities_EnumInstances");
+    const Host::ObjectPath& ref = path(Class);
+    EXPECT_THAT(traceOf([&] { enumerate(ref); }),
+        ElementsAreArray(sequence({lines.entry(), Builder.entry(), BuiltWithoutSensors, counted(),
+            counted(), SensorPaths, Builder.failure("getAllSensorCMPIObjPaths failed"),
+            Builder.exit(), lines.exit()})));
+}
+
+TEST_F(ElementCapabilitiesTraceTest, ofAnInstanceSearched)
+{
+    const HandlerLines lines = handler("SensorElementCapabilities_GetInstance");
+    const Host::ObjectPath& ref = path(Class, {{"Other", "x"}});
+    EXPECT_THAT(traceOf([&] { get(ref); }),
+        ElementsAreArray(sequence({lines.entry(), Builder.entry(), Built, counted(), counted(),
+            SensorPaths, CapPaths, CapPaths, Builder.exit(), lines.exit()})));
+}
+
+TEST_F(ElementCapabilitiesTraceTest, ofARequestWithoutKeysHasNoFactory)
+{
+    const HandlerLines lines = handler("SensorElementCapabilities_GetInstance");
+    const Host::ObjectPath& ref = path(Class);
+    EXPECT_THAT(traceOf([&] { get(ref); }),
+        ElementsAreArray(sequence(
+            {lines.entry(), lines.failure("At least one key should be passed"), lines.exit()})));
+}
+
+// ---- Associated objects ----
+
+TEST_F(ElementCapabilitiesTraceTest, ofTheAssociatorsOfCapabilities)
+{
+    const HandlerLines lines = handler("SensorElementCapabilities_Associators");
+    const Host::ObjectPath& source = capabilities();
+    const Lines instance = operation("makeSensorInstance", 269, 737);
+    EXPECT_THAT(traceOf([&] { associators(source, {.resultClass = "Result"}); }),
+        ElementsAreArray(sequence({lines.entry(), Built, counted(), lookedUp(Class, "Result", 1252),
+            around(operation("getAllSensorCMPIInstances"), sequence({instance, instance})),
+            lines.exit()})));
+}
+
+TEST_F(ElementCapabilitiesTraceTest, ofTheAssociatorsOfASensor)
+{
+    const HandlerLines lines = handler("SensorElementCapabilities_Associators");
+    const Host::ObjectPath& source = sensor("B:/2");
+    EXPECT_THAT(traceOf([&] { associators(source, {.associationClass = Class}); }),
+        ElementsAreArray(sequence({lines.entry(), Built, counted(), lookedUp(Class, "(null)", 1236),
+            around(operation("getAllSensorEnabledLogicalElementCapCMPIInstances", 996, 1017),
+                operation("makeSensorEnabledLogicalElementCapInstance", 863, 965)),
+            lines.exit()})));
+}
+
+TEST_F(ElementCapabilitiesTraceTest, ofTheNamesOfAssociators)
+{
+    const HandlerLines lines = handler("SensorElementCapabilities_AssociatorNames");
+    const Host::ObjectPath& source = sensor("B:/2");
+    EXPECT_THAT(traceOf([&] { associatorNames(source, {.resultClass = "Result"}); }),
+        ElementsAreArray(sequence({lines.entry(), Built, counted(), lookedUp(Class, "Result", 1236),
+            CapPaths, lines.exit()})));
+}
+
+TEST_F(ElementCapabilitiesTraceTest, ofATargetThatNobodyHereLeadsTo)
+{
+    const HandlerLines lines = handler("SensorElementCapabilities_AssociatorNames");
+    const Host::ObjectPath& source = sensor("B:/2");
+    const char* const other = "ZUMLO_SensorSystemDevice";
+    EXPECT_THAT(traceOf([&] { associatorNames(source, {.associationClass = other}); }),
+        ElementsAreArray(sequence(
+            {lines.entry(), Built, counted(), lookedUp(other, "(null)", 1221), lines.exit()})));
+}
+
+TEST_F(ElementCapabilitiesTraceTest, ofReferences)
+{
+    const HandlerLines instances = handler("SensorElementCapabilities_References");
+    const HandlerLines names = handler("SensorElementCapabilities_ReferenceNames");
+    const Host::ObjectPath& source = capabilities();
+    EXPECT_THAT(traceOf([&] { references(source, {.resultClass = "not passed on"}); }),
+        ElementsAreArray(sequence({instances.entry(), Built, counted(),
+            lookedUp(Class, "(null)", 1252), SensorPaths, instances.exit()})));
+    EXPECT_THAT(traceOf([&] { referenceNames(source, {.resultClass = "not passed on"}); }),
+        ElementsAreArray(sequence({names.entry(), Built, counted(), lookedUp(Class, "(null)", 1252),
+            SensorPaths, names.exit()})));
+}
+
+TEST_F(ElementCapabilitiesEmptyTraceTest, ofSensorsThatAreNotThere)
+{
+    const Host::ObjectPath& source = capabilities();
+    const auto expected = [](const std::string& function) {
+        const HandlerLines lines = handler(function);
+        return sequence(
+            {lines.entry(), BuiltWithoutSensors, counted(), lookedUp(Class, "(null)", 1252),
+                SensorPaths, lines.failure("getAllSensorCMPIObjPaths failed"), lines.exit()});
+    };
+    EXPECT_THAT(traceOf([&] { associatorNames(source); }),
+        ElementsAreArray(expected("SensorElementCapabilities_AssociatorNames")));
+    EXPECT_THAT(traceOf([&] { references(source); }),
+        ElementsAreArray(expected("SensorElementCapabilities_References")));
+    EXPECT_THAT(traceOf([&] { referenceNames(source); }),
+        ElementsAreArray(expected("SensorElementCapabilities_ReferenceNames")));
+}
+
+TEST_F(ElementCapabilitiesTraceTest, ofASourceWithoutTarget)
+{
+    const Host::ObjectPath& source = system("host");
+    const auto expected = [](const std::string& request, const std::string& text) {
+        const HandlerLines lines = handler("SensorElementCapabilities_" + request);
+        return sequence({lines.entry(), Built, counted(), lookedUp(Class, "(null)", 1259),
+            lines.failure("Object Path is NULL in " + text), lines.exit()});
+    };
+    EXPECT_THAT(traceOf([&] { associators(source); }),
+        ElementsAreArray(expected("Associators", "Associators")));
+    EXPECT_THAT(traceOf([&] { associatorNames(source); }),
+        ElementsAreArray(expected("AssociatorNames", "AssociatorsNames")));
+    EXPECT_THAT(traceOf([&] { references(source); }),
+        ElementsAreArray(expected("References", "References")));
+    EXPECT_THAT(traceOf([&] { referenceNames(source); }),
+        ElementsAreArray(expected("ReferenceNames", "ReferenceNames")));
+}
+
+} // namespace
