@@ -1,0 +1,81 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// What the providers of this product publish, held against the classes it ships.
+
+#include "host/broker/CollectedResult.h"
+#include "host/broker/Instance.h"
+#include "host/broker/ObjectPath.h"
+#include "host/broker/Request.h"
+#include "host/broker/String.h"
+#include "host/manager/Manager.h"
+#include "host/manager/SensorProfile.h"
+#include "host/repository/Compiler.h"
+#include "host/repository/Words.h"
+#include "tests/support/Environment.h"
+
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+namespace {
+
+using ::testing::UnorderedElementsAreArray;
+
+constexpr const char* Cimv2 = "root/cimv2";
+
+std::unique_ptr<const Host::Repository> shippedClasses()
+{
+    Host::Compiler compiler;
+    compiler.compileFile(SENSOR_PROFILE_SOURCE_DIR "/schema/host.mof", Cimv2);
+    return std::move(compiler).finish();
+}
+
+class ProvidedPropertiesTest : public ::testing::TestWithParam<const char*> {
+protected:
+    Testing::EnvironmentVariable machine_{
+        "VORN_INSTRUMENTATION", "model:" SENSOR_PROFILE_SOURCE_DIR "/schema/demo-model.json"};
+    std::unique_ptr<const Host::Repository> repository_ = shippedClasses();
+    Host::Manager manager_{*repository_,
+        Host::sensorProfileProviders(SENSOR_PROFILE_BINARY_DIR "/lib/libSensorProfileProvider.so",
+            SENSOR_PROFILE_BINARY_DIR "/lib/libComputerSystemProvider.so")};
+};
+
+TEST_P(ProvidedPropertiesTest, areDeclaredWithTheTypeTheyHave)
+{
+    const Host::ClassDeclaration& declared = *repository_->findClass(Cimv2, GetParam());
+    Host::Request request(manager_.broker());
+    Host::CollectedResult answer;
+    manager_.enumerateInstances(
+        request.context(), request.makePath(Cimv2, GetParam()), nullptr, answer);
+    ASSERT_FALSE(answer.instances().empty());
+    for (const Host::Instance* const instance : answer.instances()) {
+        ASSERT_NE(instance->properties().size(), 0U);
+        for (const Host::NamedValue& each : instance->properties()) {
+            const std::string name(*each.name->text());
+            const Host::PropertyDeclaration* const property = declared.property(name);
+            ASSERT_NE(property, nullptr) << name;
+            EXPECT_EQ(property->name, name);
+            EXPECT_EQ(Host::nameOfType(property->type), Host::nameOfType(each.value.type()))
+                << name;
+        }
+    }
+}
+
+TEST_P(ProvidedPropertiesTest, keysOfPathsAreThoseOfTheClass)
+{
+    Host::Request request(manager_.broker());
+    Host::CollectedResult answer;
+    manager_.enumerateInstanceNames(request.context(), request.makePath(Cimv2, GetParam()), answer);
+    ASSERT_FALSE(answer.paths().empty());
+    for (const Host::ObjectPath* const path : answer.paths()) {
+        std::vector<std::string> keys;
+        for (const Host::NamedValue& key : path->keys())
+            keys.emplace_back(*key.name->text());
+        EXPECT_THAT(keys, UnorderedElementsAreArray(*repository_->keysOf(Cimv2, GetParam())));
+    }
+}
+
+INSTANTIATE_TEST_SUITE_P(Classes, ProvidedPropertiesTest,
+    ::testing::Values("ZUMLO_NumericSensor", "ZUMLO_SensorEnabledLogicalElementCapabilities",
+        "ZUMLO_SensorElementCapabilities", "ZUMLO_SensorSystemDevice", "ZUMLO_ComputerSystem"));
+
+} // namespace

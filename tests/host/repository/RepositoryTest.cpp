@@ -1,0 +1,134 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// What a compiled repository answers.
+
+#include "tests/host/repository/MofTest.h"
+
+#include <gmock/gmock.h>
+
+#include <atomic>
+#include <thread>
+
+namespace {
+
+using ::testing::ElementsAre;
+using ::testing::IsEmpty;
+using Testing::NameSpace;
+using Depth = Host::Repository::Depth;
+
+class RepositoryTest : public ::testing::Test {
+protected:
+    static std::vector<std::string> names(const std::vector<const Host::ClassDeclaration*>& classes)
+    {
+        std::vector<std::string> found;
+        for (const auto* const each : classes)
+            found.push_back(each->name);
+        return found;
+    }
+
+    std::unique_ptr<const Host::Repository> repository_ = Testing::compile(R"(
+        class Top { [Key] string Id; };
+        class Left : Top { };
+        class Right : Top { };
+        class LeftOne : Left { };
+        class LeftTwo : Left { };
+        class Other { };
+        [Association] class Link { [Key] Top ref One; [Key] Other ref Two; string Note; };)");
+};
+
+TEST_F(RepositoryTest, findsClassesInAnyCaseAndSpellsThemAsDeclared)
+{
+    EXPECT_EQ(repository_->findClass("ROOT/TEST", "LEFTone")->name, "LeftOne");
+    EXPECT_EQ(repository_->findClass("/root/test/", "LeftOne")->name, "LeftOne");
+    EXPECT_EQ(repository_->findClass(NameSpace, "Left One"), nullptr);
+    EXPECT_EQ(repository_->findClass(NameSpace, ""), nullptr);
+    EXPECT_EQ(repository_->findClass("root/other", "Left"), nullptr);
+    EXPECT_EQ(repository_->findQualifier(NameSpace, "KEY")->name, "Key");
+    EXPECT_EQ(repository_->findQualifier(NameSpace, "Lock"), nullptr);
+    EXPECT_EQ(repository_->findQualifier("", "Key"), nullptr);
+    EXPECT_EQ(repository_->findNamespace(NameSpace)->qualifiers().front()->name, "Abstract");
+}
+
+TEST_F(RepositoryTest, listsSubclassesDirectAndDeep)
+{
+    EXPECT_THAT(names(repository_->subclasses(NameSpace, "top", Depth::direct)),
+        ElementsAre("Left", "Right"));
+    EXPECT_THAT(names(repository_->subclasses(NameSpace, "Top", Depth::deep)),
+        ElementsAre("Left", "LeftOne", "LeftTwo", "Right"));
+    EXPECT_THAT(repository_->subclasses(NameSpace, "LeftOne", Depth::deep), IsEmpty());
+    EXPECT_THAT(repository_->subclasses(NameSpace, "None", Depth::deep), IsEmpty());
+    EXPECT_THAT(repository_->subclasses("root", "Top", Depth::deep), IsEmpty());
+}
+
+TEST_F(RepositoryTest, listsTheRootsForNoClass)
+{
+    EXPECT_THAT(names(repository_->subclasses(NameSpace, "", Depth::direct)),
+        ElementsAre("Top", "Other", "Link"));
+    EXPECT_THAT(names(repository_->subclasses(NameSpace, "", Depth::deep)),
+        ElementsAre("Top", "Left", "LeftOne", "LeftTwo", "Right", "Other", "Link"));
+    EXPECT_THAT(repository_->subclasses("root", "", Depth::deep), IsEmpty());
+}
+
+TEST_F(RepositoryTest, listsAncestorsFromNearToFar)
+{
+    EXPECT_THAT(names(repository_->ancestors(NameSpace, "leftone")), ElementsAre("Left", "Top"));
+    EXPECT_THAT(repository_->ancestors(NameSpace, "Top"), IsEmpty());
+    EXPECT_THAT(repository_->ancestors(NameSpace, "None"), IsEmpty());
+}
+
+TEST_F(RepositoryTest, tellsDescentAtAnyDistance)
+{
+    EXPECT_TRUE(repository_->isDerivedFrom(NameSpace, "LeftOne", "TOP"));
+    EXPECT_TRUE(repository_->isDerivedFrom(NameSpace, "LeftOne", "Left"));
+    EXPECT_FALSE(repository_->isDerivedFrom(NameSpace, "LeftOne", "Right"));
+    EXPECT_FALSE(repository_->isDerivedFrom(NameSpace, "Top", "Top"));
+    EXPECT_FALSE(repository_->isDerivedFrom(NameSpace, "None", "Top"));
+    EXPECT_FALSE(repository_->isDerivedFrom("root", "Left", "Top"));
+}
+
+TEST_F(RepositoryTest, classesTellDescentFromOneAnother)
+{
+    const auto& left = Testing::classNamed(*repository_, "Left");
+    EXPECT_TRUE(Testing::classNamed(*repository_, "LeftOne").isDerivedFrom(left));
+    EXPECT_FALSE(left.isDerivedFrom(left));
+    EXPECT_FALSE(Testing::classNamed(*repository_, "Right").isDerivedFrom(left));
+}
+
+TEST_F(RepositoryTest, listsReferencesOfAssociationsOnly)
+{
+    const auto references = repository_->referencesOf(NameSpace, "LINK");
+    ASSERT_EQ(references.size(), 2U);
+    EXPECT_EQ(references[0].name, "One");
+    EXPECT_EQ(references[0].className, "Top");
+    EXPECT_EQ(references[1].className, "Other");
+    EXPECT_THAT(repository_->referencesOf(NameSpace, "Top"), IsEmpty());
+    EXPECT_THAT(repository_->referencesOf(NameSpace, "None"), IsEmpty());
+    EXPECT_FALSE(repository_->isAssociation(NameSpace, "None"));
+}
+
+TEST_F(RepositoryTest, keysAreTheSameListAtEveryRequest)
+{
+    const auto* const keys = repository_->keysOf(NameSpace, "Right");
+    ASSERT_NE(keys, nullptr);
+    EXPECT_THAT(*keys, ElementsAre("Id"));
+    EXPECT_EQ(repository_->keysOf("Root/Test", "right"), keys);
+    EXPECT_EQ(repository_->keysOf("root", "Right"), nullptr);
+}
+
+TEST_F(RepositoryTest, answersManyThreadsAtOnce)
+{
+    std::atomic<int> right = 0;
+    std::vector<std::thread> threads;
+    for (int i = 0; i < 4; ++i)
+        threads.emplace_back([&] {
+            for (int round = 0; round < 500; ++round)
+                right += repository_->isDerivedFrom(NameSpace, "LeftTwo", "Top") &&
+                         repository_->keysOf(NameSpace, "LeftTwo")->size() == 1 &&
+                         repository_->subclasses(NameSpace, "Top", Depth::deep).size() == 4;
+        });
+    for (std::thread& thread : threads)
+        thread.join();
+    EXPECT_EQ(right, 2000);
+}
+
+} // namespace

@@ -1,0 +1,172 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// The classes this product ships.
+
+#include "host/repository/Compiler.h"
+
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+#include <cmpidt.h>
+
+namespace {
+
+using ::testing::ElementsAre;
+
+constexpr const char* Cimv2 = "root/cimv2";
+constexpr const char* Interop = "root/interop";
+const std::filesystem::path Folder = SENSOR_PROFILE_SOURCE_DIR "/schema";
+
+class ShippedSchemaTest : public ::testing::Test {
+protected:
+    static std::unique_ptr<const Host::Repository> compileAll()
+    {
+        Host::Compiler compiler;
+        compiler.compileFile(Folder / "host.mof", "root/other");
+        return std::move(compiler).finish();
+    }
+
+    std::vector<std::string> ancestors(const char* className, const char* nameSpace = Cimv2) const
+    {
+        std::vector<std::string> names;
+        for (const auto* const each : repository_->ancestors(nameSpace, className))
+            names.push_back(each->name);
+        return names;
+    }
+
+    std::vector<std::string> references(const char* className) const
+    {
+        std::vector<std::string> found;
+        for (const auto& each : repository_->referencesOf(Cimv2, className))
+            found.push_back(each.name + " -> " + each.className);
+        return found;
+    }
+
+    const std::vector<std::string>& keys(const char* className, const char* nameSpace = Cimv2) const
+    {
+        return *repository_->keysOf(nameSpace, className);
+    }
+
+    std::unique_ptr<const Host::Repository> repository_ = compileAll();
+};
+
+TEST_F(ShippedSchemaTest, sensorsAreNumericSensors)
+{
+    EXPECT_THAT(ancestors("ZUMLO_NumericSensor"),
+        ElementsAre("CIM_NumericSensor", "CIM_Sensor", "CIM_LogicalDevice",
+            "CIM_EnabledLogicalElement", "CIM_LogicalElement", "CIM_ManagedSystemElement",
+            "CIM_ManagedElement"));
+    EXPECT_THAT(keys("ZUMLO_NumericSensor"),
+        ElementsAre("SystemCreationClassName", "SystemName", "CreationClassName", "DeviceID"));
+}
+
+TEST_F(ShippedSchemaTest, capabilitiesAreNamedByAnInstanceId)
+{
+    EXPECT_THAT(ancestors("ZUMLO_SensorEnabledLogicalElementCapabilities"),
+        ElementsAre(
+            "CIM_EnabledLogicalElementCapabilities", "CIM_Capabilities", "CIM_ManagedElement"));
+    EXPECT_THAT(keys("ZUMLO_SensorEnabledLogicalElementCapabilities"), ElementsAre("InstanceID"));
+}
+
+TEST_F(ShippedSchemaTest, theComputerSystemIsNamedByClassAndName)
+{
+    EXPECT_THAT(ancestors("ZUMLO_ComputerSystem"),
+        ElementsAre("CIM_ComputerSystem", "CIM_System", "CIM_EnabledLogicalElement",
+            "CIM_LogicalElement", "CIM_ManagedSystemElement", "CIM_ManagedElement"));
+    EXPECT_THAT(keys("ZUMLO_ComputerSystem"), ElementsAre("CreationClassName", "Name"));
+}
+
+TEST_F(ShippedSchemaTest, associationsAreKeyedByTheirReferences)
+{
+    EXPECT_THAT(
+        ancestors("ZUMLO_SensorElementCapabilities"), ElementsAre("CIM_ElementCapabilities"));
+    EXPECT_THAT(
+        keys("ZUMLO_SensorElementCapabilities"), ElementsAre("ManagedElement", "Capabilities"));
+    EXPECT_THAT(references("ZUMLO_SensorElementCapabilities"),
+        ElementsAre("ManagedElement -> ZUMLO_NumericSensor",
+            "Capabilities -> ZUMLO_SensorEnabledLogicalElementCapabilities"));
+    EXPECT_THAT(ancestors("ZUMLO_SensorSystemDevice"),
+        ElementsAre("CIM_SystemDevice", "CIM_SystemComponent", "CIM_Component"));
+    EXPECT_THAT(keys("ZUMLO_SensorSystemDevice"), ElementsAre("GroupComponent", "PartComponent"));
+    EXPECT_THAT(references("ZUMLO_SensorSystemDevice"),
+        ElementsAre(
+            "GroupComponent -> ZUMLO_ComputerSystem", "PartComponent -> ZUMLO_NumericSensor"));
+    EXPECT_TRUE(repository_->isAssociation(Cimv2, "ZUMLO_SensorSystemDevice"));
+    EXPECT_FALSE(repository_->isAssociation(Cimv2, "ZUMLO_NumericSensor"));
+}
+
+TEST_F(ShippedSchemaTest, interopDescribesTheObjectManager)
+{
+    EXPECT_THAT(keys("CIM_Namespace", Interop),
+        ElementsAre("SystemCreationClassName", "SystemName", "ObjectManagerCreationClassName",
+            "ObjectManagerName", "CreationClassName", "Name"));
+    EXPECT_THAT(keys("CIM_ObjectManager", Interop),
+        ElementsAre("SystemCreationClassName", "SystemName", "CreationClassName", "Name"));
+    EXPECT_THAT(keys("CIM_RegisteredProfile", Interop), ElementsAre("InstanceID"));
+    EXPECT_THAT(ancestors("CIM_ObjectManager", Interop),
+        ElementsAre("CIM_WBEMService", "CIM_Service", "CIM_EnabledLogicalElement",
+            "CIM_LogicalElement", "CIM_ManagedSystemElement", "CIM_ManagedElement"));
+}
+
+// As other object managers get it: on top of what they have, one file after the other.
+TEST_F(ShippedSchemaTest, theFilesCompileOneByOneToo)
+{
+    Host::Compiler compiler;
+    compiler.compileFile(Folder / "qualifiers.mof", Cimv2);
+    compiler.compileFile(Folder / "cim-ancestors.mof", Cimv2);
+    compiler.compileFile(Folder / "sensor-profile.mof", Cimv2);
+    const auto repository = std::move(compiler).finish();
+    EXPECT_NE(repository->findClass(Cimv2, "ZUMLO_SensorSystemDevice"), nullptr);
+}
+
+TEST_F(ShippedSchemaTest, everyElementIsDescribed)
+{
+    for (const auto& nameSpace : repository_->namespaces())
+        for (const auto& declared : nameSpace->classes()) {
+            EXPECT_NE(Host::qualifierText(declared->qualifiers, "Description"), "")
+                << declared->name;
+            for (const auto& property : declared->properties)
+                EXPECT_NE(Host::qualifierText(property->qualifiers, "Description"), "")
+                    << declared->name << "." << property->name;
+        }
+}
+
+TEST_F(ShippedSchemaTest, everyMappedValueHasItsText)
+{
+    int maps = 0;
+    for (const auto& nameSpace : repository_->namespaces())
+        for (const auto& declared : nameSpace->classes())
+            for (const auto& property : declared->properties) {
+                const auto* const map = Host::findQualifier(property->qualifiers, "ValueMap");
+                const auto* const texts = Host::findQualifier(property->qualifiers, "Values");
+                if (texts == nullptr)
+                    continue;
+                ++maps;
+                ASSERT_NE(map, nullptr) << declared->name << "." << property->name;
+                EXPECT_EQ(std::get<std::vector<Host::Scalar>>(*map->value).size(),
+                    std::get<std::vector<Host::Scalar>>(*texts->value).size())
+                    << declared->name << "." << property->name;
+            }
+    EXPECT_GT(maps, 0);
+}
+
+TEST_F(ShippedSchemaTest, mappedPropertiesExist)
+{
+    for (const auto& nameSpace : repository_->namespaces())
+        for (const auto& declared : nameSpace->classes())
+            for (const auto& property : declared->properties) {
+                const auto* const others =
+                    Host::findQualifier(property->qualifiers, "ModelCorrespondence");
+                if (others == nullptr)
+                    continue;
+                for (const auto& other : std::get<std::vector<Host::Scalar>>(*others->value)) {
+                    const std::string& text = std::get<std::string>(other);
+                    const auto dot = text.find('.');
+                    const auto* const owner = nameSpace->findClass(text.substr(0, dot));
+                    ASSERT_NE(owner, nullptr) << text;
+                    EXPECT_NE(owner->property(text.substr(dot + 1)), nullptr) << text;
+                }
+            }
+}
+
+} // namespace
