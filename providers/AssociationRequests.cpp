@@ -2,8 +2,6 @@
 
 #include "providers/AssociationRequests.h"
 
-#include "factory/ClassNames.h"
-
 #include <string>
 
 namespace Vorn::SensorProfileProvider {
@@ -40,10 +38,9 @@ void AssociationRequest::failWithoutTarget(
 }
 
 void AssociationRequest::returnReferences(Answer answer, const CMPIResult* rslt,
-    const CMPIObjectPath* op, const CMPIObjectPath* path, const CMPIObjectPath* target,
+    const CMPIObjectPath* op, const CMPIObjectPath* path, bool leadsToSensors,
     const std::vector<CMPIObjectPath*>& farEnds, CMPIStatus* status) const
 {
-    const bool leadsToSensors = isOfClass(target, SensorClass, status);
     std::vector<CMPIInstance*> associations;
     associations.reserve(farEnds.size());
     forEachCounted(farEnds, [&](const CMPIObjectPath* farEnd) {

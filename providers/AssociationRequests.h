@@ -5,6 +5,7 @@
 #pragma once
 
 #include "factory/BrokerCalls.h"
+#include "factory/ClassNames.h"
 #include "factory/SensorFactory.h"
 #include "providers/RequestHandler.h"
 
@@ -102,9 +103,9 @@ public:
     }
 
     // Hands over one association for each far end, with the source at its other end, and ends
-    // the request. `fetch(factory, target, farEnds, status)` finds the far ends; it returns the
-    // text of its failure, null when there is none. `withoutTarget` is the failure of a source
-    // whose class has no far end.
+    // the request. `fetch(factory, target, leadsToSensors, farEnds, status)` finds the far ends;
+    // it returns the text of its failure, null when there is none. `withoutTarget` is the failure
+    // of a source whose class has no far end.
     template <typename Fetch>
     CMPIStatus references(Answer answer, const CMPIResult* rslt, const CMPIObjectPath* op,
         const char* withoutTarget, const Fetch& fetch, unsigned line = __builtin_LINE()) const
@@ -120,10 +121,13 @@ public:
             return status;
         }
         if (const CMPIObjectPath* const path = newPath(broker_, op, served_.name, &status)) {
-            if (const char* const failure = fetch(factory, target, farEnds, &status))
+            // Asked once: a broker that answers differently later would turn the pairs round.
+            const bool leadsToSensors = isOfClass(target, SensorClass, &status);
+            if (const char* const failure =
+                    fetch(factory, target, leadsToSensors, farEnds, &status))
                 marks_.failure(failure, line);
             else
-                returnReferences(answer, rslt, op, path, target, farEnds, &status);
+                returnReferences(answer, rslt, op, path, leadsToSensors, farEnds, &status);
         }
         marks_.exit(line);
         return status;
@@ -132,7 +136,7 @@ public:
 private:
     // What the broker could not make is left out.
     void returnReferences(Answer answer, const CMPIResult* rslt, const CMPIObjectPath* op,
-        const CMPIObjectPath* path, const CMPIObjectPath* target,
+        const CMPIObjectPath* path, bool leadsToSensors,
         const std::vector<CMPIObjectPath*>& farEnds, CMPIStatus* status) const;
 
     AssociationClass served_;

@@ -23,9 +23,9 @@ using Failure = const char*;
 
 // The paths of all objects of the target's class; none where this provider knows no such class.
 Failure fetchPaths(SensorFactory& factory, const CMPIObjectPath* op, const CMPIObjectPath* target,
-    std::vector<CMPIObjectPath*>& paths, CMPIStatus* status)
+    bool leadsToSensors, std::vector<CMPIObjectPath*>& paths, CMPIStatus* status)
 {
-    if (isOfClass(target, SensorClass, status))
+    if (leadsToSensors)
         return factory.getAllSensorCMPIObjPaths(broker, op, paths, status) ? SensorPathsFailed
                                                                            : nullptr;
     if (isOfClass(target, SensorEnabledLogicalElementCapClass, status))
@@ -55,9 +55,10 @@ CMPIStatus references(const char* function, Answer answer, const CMPIResult* rsl
 {
     const AssociationRequest request(served(), broker, function);
     return request.references(answer, rslt, op, withoutTarget,
-        [op](SensorFactory& factory, const CMPIObjectPath* target,
-            std::vector<CMPIObjectPath*>& farEnds,
-            CMPIStatus* status) { return fetchPaths(factory, op, target, farEnds, status); });
+        [op](SensorFactory& factory, const CMPIObjectPath* target, bool leadsToSensors,
+            std::vector<CMPIObjectPath*>& farEnds, CMPIStatus* status) {
+            return fetchPaths(factory, op, target, leadsToSensors, farEnds, status);
+        });
 }
 
 } // namespace
@@ -100,7 +101,8 @@ CMPIStatus SensorElementCapabilities_AssociatorNames(CMPIAssociationMI*, const C
         request.failWithoutTarget("Object Path is NULL in AssociatorsNames", &status);
         return status;
     }
-    if (const Failure failure = fetchPaths(factory, op, target, paths, &status))
+    const bool leadsToSensors = isOfClass(target, SensorClass, &status);
+    if (const Failure failure = fetchPaths(factory, op, target, leadsToSensors, paths, &status))
         request.marks().failure(failure);
     else
         returnPaths(rslt, op, paths, &status);

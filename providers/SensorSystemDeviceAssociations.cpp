@@ -101,10 +101,10 @@ CMPIStatus associators(const char* function, Answer answer, const CMPIContext* c
 // The far ends of the source's associations, of the target's class. The text of the failure,
 // null when there is none.
 const char* fetchFarEnds(const CMPIContext* ctx, const CMPIObjectPath* op,
-    const CMPIObjectPath* target, SensorFactory& factory, std::vector<CMPIObjectPath*>& farEnds,
-    CMPIStatus* status)
+    const CMPIObjectPath* target, bool leadsToSensors, SensorFactory& factory,
+    std::vector<CMPIObjectPath*>& farEnds, CMPIStatus* status)
 {
-    if (isOfClass(target, SensorClass, status))
+    if (leadsToSensors)
         return factory.getAllSensorCMPIObjPaths(broker, op, farEnds, status) ? SensorPathsFailed
                                                                              : nullptr;
     if (!isOfClass(target, ComputerSystemClass, status))
@@ -125,9 +125,9 @@ CMPIStatus references(const char* function, Answer answer, const CMPIContext* ct
 {
     const AssociationRequest request(served(), broker, function);
     return request.references(answer, rslt, op, withoutTarget,
-        [ctx, op](SensorFactory& factory, const CMPIObjectPath* target,
+        [ctx, op](SensorFactory& factory, const CMPIObjectPath* target, bool leadsToSensors,
             std::vector<CMPIObjectPath*>& farEnds, CMPIStatus* status) {
-            return fetchFarEnds(ctx, op, target, factory, farEnds, status);
+            return fetchFarEnds(ctx, op, target, leadsToSensors, factory, farEnds, status);
         });
 }
 
