@@ -40,18 +40,54 @@ public:
                 std::string(message.component), std::string(message.text)});
         });
         const CMPIObjectPath* const source = faulty.watch(kind.source(request_).handle());
+        const Strings recording(faulty.handle()->eft, &strings_);
+        CMPIBrokerEncFT functions = *faulty.handle()->eft;
+        functions.newString = &Strings::make;
+        CMPIBroker recorded = *faulty.handle();
+        recorded.eft = &functions;
         status = kind.run(
-            faulty.handle(), request_.context().handle(), faulty.watch(result_.handle()), source);
+            &recorded, request_.context().handle(), faulty.watch(result_.handle()), source);
         broker.setTraceObserver({});
     }
 
     std::string message() const { return textOf(status.msg); }
+    // The last string the provider had made, and its last message to the broker's trace.
+    std::string lastString() const { return strings_.empty() ? "none" : strings_.back(); }
+    BrokerMessage lastMessage() const
+    {
+        return messages.empty() ? BrokerMessage{} : messages.back();
+    }
 
     Host::CollectedResult answer;
     std::vector<BrokerMessage> messages;
     CMPIStatus status = {};
 
 private:
+    // Writes down the texts of the strings that are made while it lives.
+    class Strings {
+    public:
+        Strings(const CMPIBrokerEncFT* functions, std::vector<std::string>* texts)
+            : functions_(functions), texts_(texts)
+        {
+            inForce_ = this;
+        }
+        ~Strings() { inForce_ = nullptr; }
+        Strings(const Strings&) = delete;
+        Strings& operator=(const Strings&) = delete;
+
+        static CMPIString* make(const CMPIBroker* broker, const char* text, CMPIStatus* rc)
+        {
+            inForce_->texts_->emplace_back(text);
+            return inForce_->functions_->newString(broker, text, rc);
+        }
+
+    private:
+        inline static const Strings* inForce_ = nullptr;
+        const CMPIBrokerEncFT* functions_;
+        std::vector<std::string>* texts_;
+    };
+
+    std::vector<std::string> strings_;
     Host::Request request_;
     Host::Result result_{answer};
 };

@@ -127,6 +127,14 @@ inline Lines builtFactory(const Lines& maps)
     return around(operation("SensorFactory"), inner);
 }
 
+// The lines of the provider alone.
+inline Lines ownLines(Lines lines)
+{
+    std::erase_if(
+        lines, [](const std::string& line) { return line.starts_with("SensorFactory "); });
+    return lines;
+}
+
 // The look-up of an association's target. `exit` is the line that its outcome has.
 inline Lines lookedUp(const std::string& association, const std::string& resultClass, unsigned exit)
 {

@@ -1,0 +1,349 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// What becomes of a request of ZUMLO_SensorElementCapabilities when the broker fails it.
+
+#include "tests/providers/Factories.h"
+#include "tests/providers/FaultyAssociation.h"
+#include "tests/providers/RequestTrace.h"
+
+#include <gmock/gmock.h>
+
+namespace {
+
+using namespace Testing;
+using ::testing::ElementsAre;
+using ::testing::ElementsAreArray;
+using ::testing::IsEmpty;
+
+constexpr const char* Class = "ZUMLO_SensorElementCapabilities";
+constexpr const char* CapabilitiesClass = "ZUMLO_SensorEnabledLogicalElementCapabilities";
+constexpr const char* Provider = "SensorElementCapabilitiesProvider";
+constexpr const char* CapabilitiesProvider = "SensorEnabledLogicalElementCapabilitiesProvider";
+const std::string Gap(21, ' ');
+
+const AssociationKinds Kinds = {SensorElementCapabilitiesProvider_Create_InstanceMI,
+    SensorElementCapabilitiesProvider_Create_AssociationMI};
+const SourceMaker Keyless = pathMaker(Class);
+const SourceMaker Sensor = sensorMaker("B:/2");
+const SourceMaker Capabilities =
+    pathMaker(CapabilitiesClass, "InstanceID", "ZUMLO:SensorEnabledLogicalElementCap1");
+const SourceMaker Pair = pairMaker(Class, "ManagedElement", Sensor, "Capabilities", Capabilities);
+
+const RequestKind Names = Kinds.names(Keyless);
+const RequestKind Instances = Kinds.instances(Keyless);
+const RequestKind OneInstance = Kinds.one("oneInstance", Pair);
+const RequestKind FromSensor[] = {Kinds.associators("Sensor", Sensor),
+    Kinds.associatorNames("Sensor", Sensor), Kinds.references("Sensor", Sensor),
+    Kinds.referenceNames("Sensor", Sensor)};
+const RequestKind FromCapabilities[] = {Kinds.associators("Capabilities", Capabilities),
+    Kinds.associatorNames("Capabilities", Capabilities),
+    Kinds.references("Capabilities", Capabilities),
+    Kinds.referenceNames("Capabilities", Capabilities)};
+enum Which { Associators, AssociatorNames, References, ReferenceNames };
+
+class ElementCapabilitiesFaultTest : public AssociationFaultTest {
+protected:
+    ElementCapabilitiesFaultTest() : AssociationFaultTest({}) {}
+
+    static HandlerLines handler(const std::string& function)
+    {
+        return {"SensorElementCapabilities", Provider, function};
+    }
+
+    // That the builder reports a failure so, within a request that answers as if nothing had
+    // been there.
+    void expectBuilderFailure(const Fault& fault, const std::string& statusText,
+        const std::string& traceText, const std::string& messageText)
+    {
+        for (const RequestKind& kind : {Instances, OneInstance}) {
+            std::unique_ptr<FaultyRequest> request;
+            const Lines lines = ownLines(traceOf([&] { request = run(kind, fault); }));
+            EXPECT_EQ(request->status.rc, CMPI_RC_OK);
+            EXPECT_EQ(request->status.msg, nullptr);
+            EXPECT_THAT(request->answer.instances(), IsEmpty());
+            EXPECT_TRUE(request->answer.isDone());
+            EXPECT_EQ(request->lastString(), statusText);
+            EXPECT_EQ(request->lastMessage(), (BrokerMessage{2, Provider, traceText}));
+            const HandlerLines builder = handler("sensorElementCapabilitiesCMPIInstances");
+            const HandlerLines outer =
+                handler(kind.name == "instances" ? "SensorElementCapabilities_EnumInstances"
+                                                 : "SensorElementCapabilities_GetInstance");
+            EXPECT_THAT(lines, ElementsAreArray(sequence({outer.entry(), builder.entry(),
+                                   builder.failure(messageText), builder.exit(), outer.exit()})));
+        }
+    }
+
+    // That the enumeration of names ends with a status of its own.
+    void expectNamesFailure(
+        const Fault& fault, const std::string& statusText, const std::string& traceText)
+    {
+        std::unique_ptr<FaultyRequest> request;
+        const Lines lines = ownLines(traceOf([&] { request = run(Names, fault); }));
+        EXPECT_EQ(request->status.rc, CMPI_RC_ERR_FAILED);
+        EXPECT_EQ(request->message(), statusText);
+        EXPECT_FALSE(request->answer.isDone());
+        EXPECT_THAT(request->messages, ElementsAre(BrokerMessage{2, Provider, traceText}));
+        const HandlerLines names = handler("SensorElementCapabilities_EnumInstanceNames");
+        EXPECT_THAT(lines,
+            ElementsAreArray(sequence({names.entry(), names.failure(statusText), names.exit()})));
+    }
+};
+
+// ---- Every call, every way ----
+
+class ElementCapabilitiesFaultSweep : public ElementCapabilitiesFaultTest,
+                                      public ::testing::WithParamInterface<RequestKind> {};
+
+INSTANTIATE_TEST_SUITE_P(Instances, ElementCapabilitiesFaultSweep,
+    ::testing::Values(Names, Instances, OneInstance, Kinds.one("instanceWithoutKeys", Keyless)),
+    ::testing::PrintToStringParamName());
+INSTANTIATE_TEST_SUITE_P(FromSensor, ElementCapabilitiesFaultSweep, ::testing::ValuesIn(FromSensor),
+    ::testing::PrintToStringParamName());
+INSTANTIATE_TEST_SUITE_P(FromCapabilities, ElementCapabilitiesFaultSweep,
+    ::testing::ValuesIn(FromCapabilities), ::testing::PrintToStringParamName());
+
+TEST_P(ElementCapabilitiesFaultSweep, isSurvivedAndAnswersWithNothingMadeUp)
+{
+    sweepFaults(broker_, [&](FaultyBroker& faulty) {
+        const FaultyRequest request(broker_, faulty, GetParam());
+        EXPECT_LE(request.answer.paths().size() + request.answer.instances().size(), 2U);
+        expectWellFormed(request, Class,
+            {{"ManagedElement", "ZUMLO_NumericSensor"}, {"Capabilities", CapabilitiesClass}});
+    });
+}
+
+// ---- The walk over all pairs. Paths are made in this order: both sensors, then for each sensor
+// ---- the capabilities and the association. A sensor has four keys, capabilities one. ----
+
+constexpr unsigned FirstSensor = 1;
+constexpr unsigned FirstCapabilities = 3;
+constexpr unsigned FirstAssociation = 4;
+constexpr unsigned SecondAssociation = 6;
+constexpr unsigned LastKeyOfFirstSensor = 4;
+constexpr unsigned KeyOfFirstCapabilities = 9;
+
+TEST_F(ElementCapabilitiesFaultTest, namesWithoutSensorPathsEndInTheFactorysStatus)
+{
+    for (const FaultManner manner : Undelivered) {
+        std::unique_ptr<FaultyRequest> request;
+        const Lines lines = ownLines(traceOf([&] {
+            request = run(Names, {BrokerCall::newObjectPath, FirstSensor, manner});
+        }));
+        EXPECT_EQ(request->status.rc, CMPI_RC_ERR_FAILED);
+        EXPECT_EQ(request->message(), "Create CMPIObjectPath failed.");
+        EXPECT_FALSE(request->answer.isDone());
+        EXPECT_EQ(request->messages.size(), 1U); // the factory's
+        EXPECT_EQ(lines, handler("SensorElementCapabilities_EnumInstanceNames").entry());
+    }
+}
+
+TEST_F(ElementCapabilitiesFaultTest, namesWithoutCapabilitiesPathsEndInTheFactorysStatus)
+{
+    for (const FaultManner manner : Undelivered) {
+        std::unique_ptr<FaultyRequest> request;
+        const Lines lines = ownLines(traceOf([&] {
+            request = run(Names, {BrokerCall::newObjectPath, FirstCapabilities, manner});
+        }));
+        EXPECT_EQ(request->status.rc, CMPI_RC_ERR_FAILED);
+        EXPECT_EQ(request->message(), "Create CMPIObjectPath failed");
+        EXPECT_FALSE(request->answer.isDone());
+        EXPECT_EQ(lines, handler("SensorElementCapabilities_EnumInstanceNames").entry());
+    }
+}
+
+TEST_F(ElementCapabilitiesFaultTest, namesEndAtAnAssociationPathThatCannotBeMade)
+{
+    const std::string text = "Create CMPIObjectPath failed" + Gap + "for ElementCapabilities";
+    for (const FaultManner manner : Undelivered)
+        expectNamesFailure({BrokerCall::newObjectPath, FirstAssociation, manner}, text, text + ".");
+}
+
+TEST_F(ElementCapabilitiesFaultTest, namesBeforeAFailureAreDelivered)
+{
+    const auto request =
+        run(Names, {BrokerCall::newObjectPath, SecondAssociation, FaultManner::nullResult});
+    EXPECT_EQ(request->status.rc, CMPI_RC_ERR_FAILED);
+    EXPECT_EQ(request->answer.paths().size(), 1U);
+    EXPECT_FALSE(request->answer.isDone());
+}
+
+TEST_F(ElementCapabilitiesFaultTest, namesEndAtASensorPathThatIsGone)
+{
+    const std::string text = "CMPIObjectPath is NULL for Sensor class";
+    expectNamesFailure(
+        {BrokerCall::addKey, LastKeyOfFirstSensor, FaultManner::lostHandle}, text, text);
+}
+
+TEST_F(ElementCapabilitiesFaultTest, namesEndAtACapabilitiesPathThatIsGone)
+{
+    expectNamesFailure({BrokerCall::addKey, KeyOfFirstCapabilities, FaultManner::lostHandle},
+        "CMPIObjectPath is" + Gap + "NULL for SensorEnabledLogicalElementCap",
+        "CMPIObjectPath is NULL for" + Gap + "EnabledLogicalElementCap");
+}
+
+TEST_F(ElementCapabilitiesFaultTest, theBuilderReportsSensorPathsThatCannotBeMade)
+{
+    for (const FaultManner manner : Undelivered)
+        expectBuilderFailure({BrokerCall::newObjectPath, FirstSensor, manner},
+            "Create CMPIObjectPath failed.",
+            "***Can't get Sensor ObjectPaths." + std::string(13, ' ') +
+                "Exiting EnumerateInstanceNames***",
+            "getAllSensorCMPIObjPaths failed");
+}
+
+TEST_F(ElementCapabilitiesFaultTest, theBuilderReportsCapabilitiesPathsThatCannotBeMade)
+{
+    const std::string gap(17, ' ');
+    for (const FaultManner manner : Undelivered)
+        expectBuilderFailure({BrokerCall::newObjectPath, FirstCapabilities, manner},
+            "Create CMPIObjectPath failed",
+            "***Can't get ObjectPaths for" + gap + "EnabledLogicalElementCap" + gap +
+                "Exiting EnumerateInstanceNames***",
+            "getAllSensorEnabledLogicalElementCapCMPIObjPaths failed");
+}
+
+TEST_F(ElementCapabilitiesFaultTest, theBuilderReportsAnAssociationPathThatCannotBeMade)
+{
+    const std::string text = "Create CMPIObjectPath failed for ElementCapabilities";
+    for (const FaultManner manner : Undelivered)
+        for (const unsigned nth : {FirstAssociation, SecondAssociation})
+            expectBuilderFailure({BrokerCall::newObjectPath, nth, manner}, text, text + ".", text);
+}
+
+TEST_F(ElementCapabilitiesFaultTest, theBuilderReportsASensorPathThatIsGone)
+{
+    expectBuilderFailure({BrokerCall::addKey, LastKeyOfFirstSensor, FaultManner::lostHandle},
+        "CMPIObjectPath is" + std::string(17, ' ') + "NULL for Sensor",
+        "CMPIObjectPath is NULL for Sensor", "CMPIObjectPath is NULL for Sensor");
+}
+
+TEST_F(ElementCapabilitiesFaultTest, theBuilderReportsACapabilitiesPathThatIsGone)
+{
+    const std::string text = "CMPIObjectPath is NULL for EnabledLogicalElementCap";
+    expectBuilderFailure({BrokerCall::addKey, KeyOfFirstCapabilities, FaultManner::lostHandle},
+        "CMPIObjectPath is" + Gap + "NULL for EnabledLogicalElementCap", text, text);
+}
+
+TEST_F(ElementCapabilitiesFaultTest, anInstanceThatCannotBeMadeIsPassedOnAsItIs)
+{
+    for (const FaultManner manner : Undelivered) {
+        const auto request = run(Instances, {BrokerCall::newInstance, 1, manner});
+        EXPECT_EQ(request->status.rc, CMPI_RC_OK);
+        EXPECT_EQ(request->answer.refused(), 1U);
+        EXPECT_EQ(request->answer.instances().size(), 1U);
+        EXPECT_TRUE(request->answer.isDone());
+    }
+}
+
+TEST_F(ElementCapabilitiesFaultTest, anInstanceThatCannotBeMadeIsPassedOverInASearch)
+{
+    for (const FaultManner manner : Undelivered) {
+        const auto request = run(OneInstance, {BrokerCall::newInstance, 1, manner});
+        EXPECT_EQ(request->status.rc, CMPI_RC_OK);
+        EXPECT_EQ(request->answer.instances().size(), 1U); // the pair is the second one
+        EXPECT_EQ(request->answer.refused(), 0U);
+    }
+}
+
+TEST_F(ElementCapabilitiesFaultTest, aPathThatCannotCountItsKeysHasNone)
+{
+    const auto request = run(OneInstance, {BrokerCall::getKeyCount, 1, FaultManner::nullResult});
+    EXPECT_EQ(request->status.rc, CMPI_RC_ERR_FAILED);
+    EXPECT_EQ(request->message(), "At least one key should be passed");
+    EXPECT_TRUE(request->answer.isDone());
+}
+
+// ---- Associated objects. The first path that is made is the target; for references the
+// ---- association's follows, and then come the far ends. ----
+
+TEST_F(ElementCapabilitiesFaultTest, aTargetThatCannotBeMadeIsNoTarget)
+{
+    const std::string names[] = {"Associators", "AssociatorsNames", "References", "ReferenceNames"};
+    for (const FaultManner manner : Undelivered)
+        for (const auto* const kinds : {FromSensor, FromCapabilities})
+            for (const Which which : {Associators, AssociatorNames, References, ReferenceNames}) {
+                const auto request =
+                    run(kinds[which], {BrokerCall::newObjectPath, 1, manner, CMPI_RC_OK});
+                const std::string text = "Object Path is NULL in " + names[which] + ".";
+                EXPECT_EQ(request->status.rc, CMPI_RC_ERR_FAILED);
+                EXPECT_EQ(request->message(), text);
+                EXPECT_EQ(request->lastMessage(), (BrokerMessage{2, Provider, text}));
+                EXPECT_FALSE(request->answer.isDone());
+            }
+}
+
+// The ends of the paths and the trace line with which a fetch of them ends.
+TEST_F(ElementCapabilitiesFaultTest, farEndsThatCannotBeMadeEndInTheFactorysStatus)
+{
+    const std::string functions[] = {"", "SensorElementCapabilities_AssociatorNames",
+        "SensorElementCapabilities_References", "SensorElementCapabilities_ReferenceNames"};
+    for (const Which which : {AssociatorNames, References, ReferenceNames})
+        for (const bool fromSensor : {true, false}) {
+            std::unique_ptr<FaultyRequest> request;
+            const Lines lines = ownLines(traceOf([&] {
+                request = run((fromSensor ? FromSensor : FromCapabilities)[which],
+                    {BrokerCall::newObjectPath, which == AssociatorNames ? 2U : 3U,
+                        FaultManner::nullResult});
+            }));
+            EXPECT_EQ(request->status.rc, CMPI_RC_ERR_FAILED);
+            EXPECT_EQ(request->message(),
+                fromSensor ? "Create CMPIObjectPath failed" : "Create CMPIObjectPath failed.");
+            EXPECT_THAT(request->answer.paths(), IsEmpty());
+            EXPECT_THAT(request->answer.instances(), IsEmpty());
+            const HandlerLines expected = handler(functions[which]);
+            EXPECT_THAT(lines,
+                ElementsAreArray(sequence({expected.entry(),
+                    expected.failure(fromSensor
+                                         ? "getAllSensorEnabledLogicalElementCapCMPIObjPaths failed"
+                                         : "getAllSensorCMPIObjPaths failed"),
+                    expected.exit()})));
+        }
+}
+
+TEST_F(ElementCapabilitiesFaultTest, withoutAnAssociationPathThereAreNoReferences)
+{
+    for (const FaultManner manner : Undelivered)
+        for (const Which which : {References, ReferenceNames}) {
+            const auto request =
+                run(FromSensor[which], {BrokerCall::newObjectPath, 2, manner, CMPI_RC_ERR_FAILED});
+            EXPECT_EQ(request->status.rc, CMPI_RC_ERR_FAILED); // as the broker left it
+            EXPECT_THAT(request->answer.paths(), IsEmpty());
+            EXPECT_THAT(request->answer.instances(), IsEmpty());
+            EXPECT_EQ(request->answer.refused(), 0U);
+        }
+}
+
+TEST_F(ElementCapabilitiesFaultTest, aReferenceThatCannotBeMadeIsLeftOut)
+{
+    for (const FaultManner manner : Undelivered)
+        for (const Which which : {References, ReferenceNames}) {
+            const auto request = run(FromCapabilities[which], {BrokerCall::newInstance, 1, manner});
+            EXPECT_EQ(request->status.rc, CMPI_RC_OK);
+            EXPECT_EQ(request->answer.paths().size() + request->answer.instances().size(), 1U);
+            EXPECT_EQ(request->answer.refused(), 0U);
+        }
+}
+
+TEST_F(ElementCapabilitiesFaultTest, aReferenceWhosePathIsNotToldIsLeftOutOfTheNames)
+{
+    for (const FaultManner manner : Undelivered) {
+        const auto request =
+            run(FromCapabilities[ReferenceNames], {BrokerCall::getObjectPath, 1, manner});
+        EXPECT_EQ(request->answer.paths().size(), 1U);
+        EXPECT_EQ(request->answer.refused(), 0U);
+    }
+}
+
+TEST_F(ElementCapabilitiesFaultTest, aMissingArrayStandsInTheStatusBesideTheAssociator)
+{
+    const auto request = run(
+        FromSensor[Associators], {BrokerCall::newArray, 1, FaultManner::nullResult, CMPI_RC_OK});
+    EXPECT_EQ(request->status.rc, CMPI_RC_ERR_FAILED);
+    EXPECT_EQ(request->message(),
+        "Creating array for Property" + std::string(25, ' ') + "RequestedStatesSupported failed.");
+    EXPECT_EQ(request->lastMessage().component, CapabilitiesProvider);
+    ASSERT_EQ(request->answer.instances().size(), 1U);
+    EXPECT_EQ(request->answer.instances()[0]->properties().size(), 2U);
+}
+
+} // namespace

@@ -1,0 +1,183 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// All requests to an association provider, for a broker that fails them.
+
+#pragma once
+
+#include "tests/providers/ComputerSystems.h"
+#include "tests/providers/FaultyRequest.h"
+#include "tests/providers/ProfileClasses.h"
+
+#include <algorithm>
+#include <string>
+#include <vector>
+
+namespace Testing {
+
+using SourceMaker = std::function<Host::ObjectPath&(const Host::Request&)>;
+
+// A path with one text key, which is enough for a source.
+inline SourceMaker pathMaker(
+    const std::string& className, const std::string& key = {}, const std::string& text = {})
+{
+    return [=](const Host::Request& request) -> Host::ObjectPath& {
+        Host::ObjectPath& made = request.makePath("root/cimv2", className);
+        if (!key.empty())
+            made.addKey(key, Host::Value::text(request.arena(), text));
+        return made;
+    };
+}
+
+inline SourceMaker pairMaker(const std::string& className, const std::string& one,
+    const SourceMaker& first, const std::string& other, const SourceMaker& second)
+{
+    return [=](const Host::Request& request) -> Host::ObjectPath& {
+        Host::ObjectPath& made = request.makePath("root/cimv2", className);
+        made.addKey(one, Host::Value::of(first(request)));
+        made.addKey(other, Host::Value::of(second(request)));
+        return made;
+    };
+}
+
+inline SourceMaker sensorMaker(const std::string& deviceID)
+{
+    return [=](const Host::Request& request) -> Host::ObjectPath& {
+        Host::ObjectPath& made = request.makePath("root/cimv2", "ZUMLO_NumericSensor");
+        for (const auto& [key, text] : std::vector<std::pair<std::string, std::string>>{
+                 {"CreationClassName", "ZUMLO_NumericSensor"}, {"DeviceID", deviceID},
+                 {"SystemCreationClassName", "ZUMLO_ComputerSystem"},
+                 {"SystemName", Vorn::getSystemName()}})
+            made.addKey(key, Host::Value::text(request.arena(), text));
+        return made;
+    };
+}
+
+// The kinds of requests to the provider with these factories.
+struct AssociationKinds {
+    CMPIInstanceMI* (*instanceFactory)(const CMPIBroker*, const CMPIContext*, CMPIStatus*);
+    CMPIAssociationMI* (*associationFactory)(const CMPIBroker*, const CMPIContext*, CMPIStatus*);
+
+    RequestKind names(const SourceMaker& ref) const
+    {
+        return {"names", ref,
+            [make = instanceFactory](auto* broker, auto* context, auto* result, auto* path) {
+                CMPIInstanceMI* const mi = make(broker, nullptr, nullptr);
+                return mi->ft->enumerateInstanceNames(mi, context, result, path);
+            }};
+    }
+
+    RequestKind instances(const SourceMaker& ref) const
+    {
+        return {"instances", ref,
+            [make = instanceFactory](auto* broker, auto* context, auto* result, auto* path) {
+                CMPIInstanceMI* const mi = make(broker, nullptr, nullptr);
+                return mi->ft->enumerateInstances(mi, context, result, path, nullptr);
+            }};
+    }
+
+    RequestKind one(const std::string& name, const SourceMaker& ref) const
+    {
+        return {name, ref,
+            [make = instanceFactory](auto* broker, auto* context, auto* result, auto* path) {
+                CMPIInstanceMI* const mi = make(broker, nullptr, nullptr);
+                return mi->ft->getInstance(mi, context, result, path, nullptr);
+            }};
+    }
+
+    RequestKind associators(const std::string& name, const SourceMaker& source) const
+    {
+        return {"associatorsOf" + name, source,
+            [make = associationFactory](auto* broker, auto* context, auto* result, auto* path) {
+                CMPIAssociationMI* const mi = make(broker, nullptr, nullptr);
+                return mi->ft->associators(
+                    mi, context, result, path, nullptr, nullptr, nullptr, nullptr, nullptr);
+            }};
+    }
+
+    RequestKind associatorNames(const std::string& name, const SourceMaker& source) const
+    {
+        return {"associatorNamesOf" + name, source,
+            [make = associationFactory](auto* broker, auto* context, auto* result, auto* path) {
+                CMPIAssociationMI* const mi = make(broker, nullptr, nullptr);
+                return mi->ft->associatorNames(
+                    mi, context, result, path, nullptr, nullptr, nullptr, nullptr);
+            }};
+    }
+
+    RequestKind references(const std::string& name, const SourceMaker& source) const
+    {
+        return {"referencesOf" + name, source,
+            [make = associationFactory](auto* broker, auto* context, auto* result, auto* path) {
+                CMPIAssociationMI* const mi = make(broker, nullptr, nullptr);
+                return mi->ft->references(mi, context, result, path, nullptr, nullptr, nullptr);
+            }};
+    }
+
+    RequestKind referenceNames(const std::string& name, const SourceMaker& source) const
+    {
+        return {"referenceNamesOf" + name, source,
+            [make = associationFactory](auto* broker, auto* context, auto* result, auto* path) {
+                CMPIAssociationMI* const mi = make(broker, nullptr, nullptr);
+                return mi->ft->referenceNames(mi, context, result, path, nullptr, nullptr);
+            }};
+    }
+};
+
+// One end of an association: the name of its reference, and the class it refers to.
+struct End {
+    const char* role;
+    const char* className;
+};
+
+// A reference that is there refers to an object of its class.
+inline void expectEnd(const Host::Value* value, const End& end)
+{
+    if (value == nullptr || value->isNull())
+        return;
+    ASSERT_NE(value->path(), nullptr) << end.role << " is " << describe(*value);
+    EXPECT_EQ(value->path()->className(), end.className) << end.role;
+}
+
+// What holds of every answer, whatever failed: all objects are of a class that the association
+// has to do with, and what an association refers to is of the right class.
+inline void expectWellFormed(
+    const FaultyRequest& request, const char* association, const std::vector<End>& ends)
+{
+    const auto isKnown = [&](std::string_view name) {
+        return name == association || std::any_of(ends.begin(), ends.end(),
+                                          [&](const End& end) { return end.className == name; });
+    };
+    for (const Host::ObjectPath* const path : request.answer.paths()) {
+        EXPECT_TRUE(isKnown(path->className())) << path->toText();
+        EXPECT_EQ(path->nameSpace(), "root/cimv2");
+        if (path->className() == association)
+            for (const End& end : ends)
+                expectEnd(path->key(end.role), end);
+    }
+    for (const Host::Instance* const instance : request.answer.instances()) {
+        EXPECT_TRUE(isKnown(instance->className())) << instance->className();
+        if (instance->className() == association)
+            for (const End& end : ends)
+                expectEnd(instance->property(end.role), end);
+    }
+    EXPECT_TRUE(request.status.rc == CMPI_RC_OK || request.status.rc == CMPI_RC_ERR_FAILED)
+        << request.status.rc;
+}
+
+// A machine of two sensors and whatever systems there are.
+class AssociationFaultTest : public FaultTest {
+protected:
+    explicit AssociationFaultTest(std::vector<std::string> systems)
+        : systems_(std::move(systems)),
+          machine_({{Vorn::NodeLexicon::NodeType::Tachometer, "/1", "A", Vorn::NodeReading{}},
+              {Vorn::NodeLexicon::NodeType::Tachometer, "/2", "B", Vorn::NodeReading{}}})
+    {
+        broker_.setClassInformation(&profileClasses());
+        broker_.setUpcalls(&systems_);
+    }
+
+    ComputerSystems systems_;
+    ScriptedMachine machine_;
+};
+
+} // namespace Testing
