@@ -30,14 +30,22 @@ const char* nameSpaceOf(const CMPIObjectPath* ref)
     return isUsable(nameSpace) ? nameSpace->ft->getCharPtr(nameSpace, nullptr) : nullptr;
 }
 
+// A broker may lose an object at any call: each is tested before each use.
+
+bool addKey(const CMPIObjectPath* path, const char* name, const char* text)
+{
+    return isUsable(path) && CMAddKey(path, name, text, CMPI_chars).rc == CMPI_RC_OK;
+}
+
 bool setText(const CMPIInstance* instance, const char* name, const char* text)
 {
-    return CMSetProperty(instance, name, text, CMPI_chars).rc == CMPI_RC_OK;
+    return isUsable(instance) && CMSetProperty(instance, name, text, CMPI_chars).rc == CMPI_RC_OK;
 }
 
 void setCode(const CMPIInstance* instance, const char* name, std::uint16_t code)
 {
-    CMSetProperty(instance, name, &code, CMPI_uint16);
+    if (isUsable(instance))
+        CMSetProperty(instance, name, &code, CMPI_uint16);
 }
 
 // An array of one element; the property is left out when there is no array with that element.
@@ -47,7 +55,8 @@ void setList(const CMPIBroker* broker, const CMPIInstance* instance, const char*
     CMPIArray* const array = CMNewArray(broker, 1, type, nullptr);
     if (!isUsable(array))
         return;
-    if (CMSetArrayElementAt(array, 0, element, type).rc == CMPI_RC_OK)
+    const CMPIStatus set = CMSetArrayElementAt(array, 0, element, type);
+    if (set.rc == CMPI_RC_OK && isUsable(array) && isUsable(instance))
         CMSetProperty(instance, name, &array, static_cast<CMPIType>(type | CMPI_ARRAY));
 }
 
@@ -100,9 +109,8 @@ CMPIObjectPath* makePath(
     if (!isUsable(path))
         return nullptr;
     CMSetHostname(path, system.name.c_str());
-    const bool isWhole =
-        CMAddKey(path, CreationClassNameKey, ComputerSystemClass, CMPI_chars).rc == CMPI_RC_OK &&
-        CMAddKey(path, NameKey, system.name.c_str(), CMPI_chars).rc == CMPI_RC_OK;
+    const bool isWhole = addKey(path, CreationClassNameKey, ComputerSystemClass) &&
+                         addKey(path, NameKey, system.name.c_str()) && isUsable(path);
     return isWhole ? path : nullptr;
 }
 
@@ -119,7 +127,7 @@ CMPIInstance* makeInstance(const CMPIBroker* broker, const CMPIObjectPath* path,
         return nullptr;
     setIdentity(broker, instance, system);
     setState(broker, instance);
-    return instance;
+    return isUsable(instance) ? instance : nullptr;
 }
 
 } // namespace Vorn::Companion
