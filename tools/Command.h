@@ -30,7 +30,8 @@ public:
 
     bool isChosen() const;
 
-    // Does the work. Throws std::exception with the text for the user when it fails.
+    // Does the work. Throws std::exception with the text for the user when it fails, UsageError
+    // when the reason is what was typed.
     virtual ExitCode run(Output& out) = 0;
 
 protected:

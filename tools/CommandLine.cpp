@@ -3,6 +3,7 @@
 #include "tools/CommandLine.h"
 
 #include "tools/Command.h"
+#include "tools/UsageError.h"
 #include "tools/commands/Commands.h"
 #include "tools/output/Output.h"
 
@@ -43,6 +44,7 @@ Commands addCommands(CLI::App& tool)
     Commands commands;
     commands.push_back(makeListCommand(tool));
     commands.push_back(makeGetCommand(tool));
+    commands.push_back(makeWalkCommand(tool));
     commands.push_back(makeRecordCommand(tool));
     return commands;
 }
@@ -91,7 +93,11 @@ ExitCode run(int argc, const char* const* argv)
     } catch (const CLI::ParseError& error) {
         return refuse(error.what());
     }
-    return runChosen(commands, out);
+    try {
+        return runChosen(commands, out);
+    } catch (const UsageError& error) {
+        return refuse(error.what());
+    }
 }
 
 } // namespace

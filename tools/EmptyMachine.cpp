@@ -57,4 +57,15 @@ ExitCode complainOfEmptyMachine(const std::optional<std::string>& model)
     return ExitCode::nothingFound;
 }
 
+ExitCode complainOfNoObject(
+    const std::string& wanted, bool isMachineEmpty, const std::optional<std::string>& model)
+{
+    if (isMachineEmpty) {
+        checkMachineIsEmpty();
+        return complainOfEmptyMachine(model);
+    }
+    complain("no object has the DeviceID, the name, the InstanceID or the path \"" + wanted + "\"");
+    return ExitCode::nothingFound;
+}
+
 } // namespace Tools

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// What to tell a user who got no sensors.
+// What to tell a user who got nothing.
 
 #pragma once
 
@@ -24,5 +24,10 @@ void checkMachineIsEmpty();
 
 // Says on standard error that the machine, or the model file, has no sensors.
 ExitCode complainOfEmptyMachine(const std::optional<std::string>& model);
+
+// Says there that no object is the one the user means, or that there are none to choose from.
+// REQUIRES and throws as checkMachineIsEmpty does when the machine is empty.
+ExitCode complainOfNoObject(
+    const std::string& wanted, bool isMachineEmpty, const std::optional<std::string>& model);
 
 } // namespace Tools

@@ -34,10 +34,11 @@ void SourceOptions::selectMachine() const
     ::setenv("VORN_INSTRUMENTATION", entry.c_str(), 1);
 }
 
-std::string SourceOptions::providerFile() const
+ProviderFiles SourceOptions::providerFiles() const
 {
     // With its folder, lest the loader search for it.
-    return provider_ ? std::filesystem::absolute(*provider_).string() : findProviderFile();
+    return {provider_ ? std::filesystem::absolute(*provider_).string() : findProviderFile(),
+        findComputerSystemProviderFile()};
 }
 
 } // namespace Tools

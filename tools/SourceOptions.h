@@ -1,8 +1,10 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Which machine is shown, and through which provider library.
+// Which machine is shown, and through which provider libraries.
 
 #pragma once
+
+#include "tools/cim/ProviderClient.h"
 
 #include <optional>
 #include <string>
@@ -28,7 +30,7 @@ public:
     void selectMachine() const;
 
     // Throws std::runtime_error when no library was given and none is found.
-    std::string providerFile() const;
+    ProviderFiles providerFiles() const;
 
 private:
     std::optional<std::string> model_;

@@ -28,10 +28,10 @@ class Value;
 class BrokerUpcalls {
 public:
     struct Association {
-        const char* associationClass;
-        const char* resultClass;
-        const char* role;
-        const char* resultRole;
+        const char* associationClass = nullptr;
+        const char* resultClass = nullptr;
+        const char* role = nullptr;
+        const char* resultRole = nullptr;
     };
 
     virtual ~BrokerUpcalls() = default;

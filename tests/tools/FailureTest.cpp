@@ -20,8 +20,9 @@ protected:
     {
         const std::string file = smallModel();
         return {{"list", "--model", file}, {"list", "--json", "--model", file},
-            {"get", "CPU 1", "--model", file}, {"record", "--model", file}, {"--help"},
-            {"--version"}};
+            {"get", "CPU 1", "--model", file}, {"walk", "--model", file},
+            {"list", "ZUMLO_ComputerSystem", "--model", file}, {"record", "--model", file},
+            {"--help"}, {"--version"}};
     }
 };
 
@@ -94,7 +95,7 @@ TEST_F(FailureTest, EveryKindOfBadModelIsAFailure)
 TEST_F(FailureTest, InstrumentationThatCannotBeUsedIsTheReason)
 {
     for (const std::vector<std::string>& arguments : std::vector<std::vector<std::string>>{
-             {"list"}, {"list", "--json"}, {"get", "CPU 1"}, {"record"}}) {
+             {"list"}, {"list", "--json"}, {"get", "CPU 1"}, {"record"}, {"walk", "CPU 1"}}) {
         const Ended ended = run(arguments, {.environment = {{"VORN_INSTRUMENTATION", "abacus"}}});
         EXPECT_EQ(ended.code, 1);
         EXPECT_EQ(ended.out, "");

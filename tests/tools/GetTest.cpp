@@ -74,8 +74,9 @@ TEST_F(GetTest, UnknownSensorIsNotFound)
         const Ended ended = got(wanted);
         EXPECT_EQ(ended.code, 3) << wanted;
         EXPECT_EQ(ended.out, "");
-        EXPECT_EQ(
-            ended.err, "sensorctl: no sensor has the DeviceID or the name \"" + wanted + "\"\n");
+        EXPECT_EQ(ended.err,
+            "sensorctl: no object has the DeviceID, the name, the InstanceID or the path \"" +
+                wanted + "\"\n");
     }
 }
 

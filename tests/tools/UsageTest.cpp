@@ -17,13 +17,13 @@ TEST(Usage, HelpGoesToStandardOutput)
     const Ended ended = run({"--help"});
     EXPECT_EQ(ended.code, 0);
     EXPECT_EQ(ended.err, "");
-    EXPECT_THAT(ended.out,
-        AllOf(HasSubstr("list"), HasSubstr("get"), HasSubstr("record"), HasSubstr("Exit codes")));
+    EXPECT_THAT(ended.out, AllOf(HasSubstr("list"), HasSubstr("get"), HasSubstr("walk"),
+                               HasSubstr("record"), HasSubstr("Exit codes")));
 }
 
 TEST(Usage, EveryCommandHasItsHelp)
 {
-    for (const char* const command : {"list", "get", "record"}) {
+    for (const char* const command : {"list", "get", "walk", "record"}) {
         const Ended ended = run({command, "--help"});
         EXPECT_EQ(ended.code, 0);
         EXPECT_THAT(ended.out, HasSubstr(std::string("sensorctl ") + command));
@@ -32,8 +32,9 @@ TEST(Usage, EveryCommandHasItsHelp)
 
 TEST(Usage, HelpFitsIntoEightyColumns)
 {
-    for (const std::vector<std::string>& arguments : std::vector<std::vector<std::string>>{
-             {"--help"}, {"list", "--help"}, {"get", "--help"}, {"record", "--help"}})
+    for (const std::vector<std::string>& arguments :
+        std::vector<std::vector<std::string>>{{"--help"}, {"list", "--help"}, {"get", "--help"},
+            {"walk", "--help"}, {"record", "--help"}})
         for (const std::string& line : linesOf(run(arguments).out))
             EXPECT_LE(line.size(), 80U) << line;
 }
@@ -49,7 +50,8 @@ TEST(Usage, WrongUsageIsSaidAndEndsWithTwo)
 {
     for (const std::vector<std::string>& arguments : std::vector<std::vector<std::string>>{{},
              {"frobnicate"}, {"list", "extra"}, {"list", "--frobnicate"}, {"list", "--model"},
-             {"list", "--color", "blue"}, {"get"}, {"get", "one", "two"}, {"record", "extra"}}) {
+             {"list", "--color", "blue"}, {"get"}, {"get", "one", "two"}, {"list", "one", "two"},
+             {"walk", "one", "two"}, {"walk", "--json"}, {"record", "extra"}}) {
         const Ended ended = run(arguments);
         EXPECT_EQ(ended.code, 2) << testing::PrintToString(arguments);
         EXPECT_EQ(ended.out, "");

@@ -3,8 +3,11 @@
 #include "tools/cim/ProviderClient.h"
 
 #include "host/broker/Instance.h"
+#include "host/broker/Names.h"
 #include "host/broker/ObjectPath.h"
-#include "host/broker/Result.h"
+#include "host/broker/Refusal.h"
+#include "host/manager/SensorProfile.h"
+#include "tools/cim/PathReader.h"
 
 #include <stdexcept>
 
@@ -12,58 +15,72 @@ namespace Tools {
 
 namespace {
 
-constexpr const char* providerName = "SensorProfileProvider";
+[[noreturn]] void fail(const Host::Refusal& refusal)
+{
+    throw std::runtime_error(
+        std::string(refusal.what()) + " (code " + std::to_string(refusal.code()) + ")");
+}
 
-// Calls the operation with a result and returns what it delivered.
-template <typename Operation>
-std::vector<const Host::Instance*> instancesFrom(Operation operation)
+} // namespace
+
+ProviderClient::ProviderClient(const ProviderFiles& files)
+    : classes_(Host::sensorProfileClasses()),
+      manager_(classes_, Host::sensorProfileProviders(files.sensors, files.computerSystem))
+{
+    for (const auto& provider : Host::sensorProfileProviders({}, std::string())) {
+        served_.push_back(provider.className);
+        if (provider.servesAssociations)
+            associations_.push_back(provider.className);
+    }
+    request_.emplace(manager_.broker(), Host::RequestInfo{.nameSpace = nameSpace});
+}
+
+std::optional<std::string> ProviderClient::declaredClass(std::string_view className) const
+{
+    for (const std::string& served : served_)
+        if (Host::equalNames(served, className))
+            return served;
+    if (classes_.keysOf(nameSpace, className) != nullptr)
+        return std::string(className);
+    return std::nullopt;
+}
+
+Instances ProviderClient::instances(const std::string& className)
 {
     Host::CollectedResult answer;
-    Host::Result result(answer);
-    const CMPIStatus status = operation(result.handle());
-    if (status.rc != CMPI_RC_OK)
-        throw std::runtime_error("the provider answers " + Host::describe(status));
+    try {
+        manager_.enumerateInstances(
+            request_->context(), request_->makePath(nameSpace, className), nullptr, answer);
+    } catch (const Host::Refusal& refusal) {
+        fail(refusal);
+    }
     if (answer.refused() != 0)
         throw std::runtime_error("the provider could not build " +
                                  std::to_string(answer.refused()) + " of the instances");
     return answer.instances();
 }
 
-} // namespace
-
-ProviderClient::ProviderClient(const std::string& providerFile) : library_(broker_, providerFile)
+const Host::Instance* ProviderClient::instance(const Host::ObjectPath& path)
 {
-    classes_.add(
-        sensorClass, {"CreationClassName", "DeviceID", "SystemCreationClassName", "SystemName"});
-    broker_.setClassInformation(&classes_);
-    request_.emplace(broker_, Host::RequestInfo{.nameSpace = nameSpace});
-}
-
-CMPIInstanceMI& ProviderClient::sensorMI()
-{
-    return library_.instanceMI(providerName);
-}
-
-std::vector<const Host::Instance*> ProviderClient::sensors()
-{
-    return instancesFrom([&](const CMPIResult* result) {
-        CMPIInstanceMI& mi = sensorMI();
-        const Host::ObjectPath& path = request_->makePath(nameSpace, sensorClass);
-        return mi.ft->enumerateInstances(
-            &mi, request_->context().handle(), result, path.handle(), nullptr);
-    });
+    try {
+        return &manager_.getInstance(request_->context(), path, nullptr);
+    } catch (const Host::Refusal& refusal) {
+        if (refusal.code() == CMPI_RC_ERR_NOT_FOUND)
+            return nullptr;
+        fail(refusal);
+    }
 }
 
 const Host::Instance* ProviderClient::sensor(std::string_view deviceId)
 {
-    const auto found = instancesFrom([&](const CMPIResult* result) {
-        CMPIInstanceMI& mi = sensorMI();
-        Host::ObjectPath& path = request_->makePath(nameSpace, sensorClass);
-        path.addKey("DeviceID", Host::Value::text(request_->arena(), deviceId));
-        return mi.ft->getInstance(
-            &mi, request_->context().handle(), result, path.handle(), nullptr);
-    });
-    return found.empty() ? nullptr : found.front();
+    Host::ObjectPath& path = request_->makePath(nameSpace, sensorClass);
+    path.addKey("DeviceID", Host::Value::text(request_->arena(), deviceId));
+    return instance(path);
+}
+
+const Host::ObjectPath* ProviderClient::readPath(std::string_view text) const
+{
+    return Tools::readPath(request_->arena(), classes_, text);
 }
 
 std::string pathOf(const Host::Instance& instance)

@@ -1,14 +1,13 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// A provider library in memory, asked as an object manager asks it.
+// The providers under the embedded object manager, asked as a CIM client asks.
 
 #pragma once
 
-#include "host/broker/Broker.h"
 #include "host/broker/ClassInformation.h"
 #include "host/broker/CollectedResult.h"
 #include "host/broker/Request.h"
-#include "host/manager/ProviderLibrary.h"
+#include "host/manager/Manager.h"
 
 #include <optional>
 #include <string>
@@ -19,27 +18,49 @@ namespace Tools {
 
 inline constexpr const char* nameSpace = "root/cimv2";
 inline constexpr const char* sensorClass = "ZUMLO_NumericSensor";
+inline constexpr const char* computerSystemClass = "ZUMLO_ComputerSystem";
+inline constexpr const char* capabilitiesClass = "ZUMLO_SensorEnabledLogicalElementCapabilities";
 
-// One request from its making to its end: the instances it returns last as long as it does.
-// Stays on the stack; one at a time. Its operations throw std::runtime_error when the provider
-// answers with an error or leaves a part of its answer out.
+struct ProviderFiles {
+    std::string sensors;
+    std::optional<std::string> computerSystem; // nothing when nobody serves that class
+};
+
+using Instances = std::vector<const Host::Instance*>;
+
+// One request from its making to its end: the objects it returns last as long as it does.
+// Stays on the stack; one at a time. Its operations throw std::runtime_error when a library
+// cannot be used, when a provider answers with an error or leaves a part of its answer out.
 class ProviderClient {
 public:
-    // Loads the library. Throws std::runtime_error when it cannot be used.
-    explicit ProviderClient(const std::string& providerFile);
+    explicit ProviderClient(const ProviderFiles& files);
 
-    // In the provider's order.
-    std::vector<const Host::Instance*> sensors();
+    // The class's name as it is declared; nothing for a class that is not known.
+    std::optional<std::string> declaredClass(std::string_view className) const;
+    // For messages: those that are served here.
+    const std::vector<std::string>& servedClasses() const { return served_; }
+    // Those of them that are associations.
+    const std::vector<std::string>& associationClasses() const { return associations_; }
+
+    // Of the class and those below it, in the provider's order.
+    Instances instances(const std::string& className);
+    // Null when there is none.
+    const Host::Instance* instance(const Host::ObjectPath& path);
+
+    Instances sensors() { return instances(sensorClass); }
     // Null when there is none with that DeviceID.
     const Host::Instance* sensor(std::string_view deviceId);
 
-private:
-    CMPIInstanceMI& sensorMI();
+    // The path that the text means, in the request; null when it is no path of a known class.
+    // Throws UsageError when it is one with a mistake in it.
+    const Host::ObjectPath* readPath(std::string_view text) const;
 
+private:
     Host::ClassTable classes_;
-    Host::Broker broker_;
-    Host::ProviderLibrary library_;
-    std::optional<Host::Request> request_; // begins once the broker is ready
+    std::vector<std::string> served_;
+    std::vector<std::string> associations_;
+    Host::Manager manager_;
+    std::optional<Host::Request> request_;
 };
 
 // Host and key values included, as a path is written in a URI.

@@ -5,33 +5,55 @@
 #include <array>
 #include <filesystem>
 #include <stdexcept>
+#include <vector>
 
 namespace Tools {
 
 namespace {
 
-constexpr const char* fileName = "libSensorProfileProvider.so";
+constexpr const char* sensorLibrary = "libSensorProfileProvider.so";
+constexpr const char* computerSystemLibrary = "libComputerSystemProvider.so";
 
 // From the folder of the tool's executable; object managers look for providers in `cmpi`
 // folders. The architecture is Debian's name for it, such as x86_64-linux-gnu.
 constexpr std::array folders = {"../lib", "../lib/cmpi", "../lib/" SENSOR_PROFILE_ARCHITECTURE,
     "../lib/" SENSOR_PROFILE_ARCHITECTURE "/cmpi", "../lib64", "../lib64/cmpi"};
 
+std::vector<std::filesystem::path> places()
+{
+    const auto here = std::filesystem::read_symlink("/proc/self/exe").parent_path();
+    std::vector<std::filesystem::path> found;
+    for (const char* const folder : folders)
+        found.push_back((here / folder).lexically_normal());
+    return found;
+}
+
+std::optional<std::string> find(const char* library)
+{
+    for (const std::filesystem::path& place : places()) {
+        std::error_code unreadable;
+        if (std::filesystem::exists(place / library, unreadable))
+            return (place / library).string();
+    }
+    return std::nullopt;
+}
+
 } // namespace
 
 std::string findProviderFile()
 {
-    const auto here = std::filesystem::read_symlink("/proc/self/exe").parent_path();
+    if (auto file = find(sensorLibrary))
+        return *std::move(file);
     std::string looked;
-    for (const char* const folder : folders) {
-        const auto place = (here / folder).lexically_normal();
-        std::error_code unreadable;
-        if (std::filesystem::exists(place / fileName, unreadable))
-            return (place / fileName).string();
+    for (const std::filesystem::path& place : places())
         looked += (looked.empty() ? "" : ", ") + place.string();
-    }
-    throw std::runtime_error(
-        std::string(fileName) + " is in none of " + looked + "; --provider FILE says where it is");
+    throw std::runtime_error(std::string(sensorLibrary) + " is in none of " + looked +
+                             "; --provider FILE says where it is");
+}
+
+std::optional<std::string> findComputerSystemProviderFile()
+{
+    return find(computerSystemLibrary);
 }
 
 } // namespace Tools

@@ -53,12 +53,14 @@ constexpr std::array<std::string_view, 20> operationalStatuses = {"Unknown", "Ot
     "Stopping", "Stopped", "In Service", "No Contact", "Lost Communication", "Aborted", "Dormant",
     "Supporting Entity in Error", "Completed", "Power Mode", "Relocating"};
 
+constexpr std::array<std::string_view, 3> dedicated = {"Not Dedicated", "Unknown", "Other"};
+
 struct ValueMap {
     std::string_view property;
     Texts texts;
 };
 
-constexpr std::array<ValueMap, 9> valueMaps = {{
+constexpr std::array<ValueMap, 10> valueMaps = {{
     {"SensorType", sensorTypes},
     {"BaseUnits", baseUnits},
     {"RateUnits", rateUnits},
@@ -68,6 +70,7 @@ constexpr std::array<ValueMap, 9> valueMaps = {{
     {"RequestedState", requestedStates},
     {"HealthState", healthStates},
     {"OperationalStatus", operationalStatuses},
+    {"Dedicated", dedicated},
 }};
 
 } // namespace

@@ -12,6 +12,7 @@ namespace Tools {
 
 std::unique_ptr<Command> makeListCommand(CLI::App& tool);
 std::unique_ptr<Command> makeGetCommand(CLI::App& tool);
+std::unique_ptr<Command> makeWalkCommand(CLI::App& tool);
 std::unique_ptr<Command> makeRecordCommand(CLI::App& tool);
 
 } // namespace Tools

@@ -4,28 +4,12 @@
 
 #include <CLI/CLI.hpp>
 
-#include <map>
-
 namespace Tools {
-
-namespace {
-
-const std::map<std::string, ColorChoice> choices = {{"auto", ColorChoice::automatic},
-    {"always", ColorChoice::always}, {"never", ColorChoice::never}};
-
-} // namespace
 
 void DisplayOptions::addTo(CLI::App& parser)
 {
     parser.add_flag("--json", isJson_, "Print a JSON document");
-    parser.add_option("--color", color_, "auto (on a terminal), always or never")
-        ->type_name("WHEN")
-        ->check(CLI::IsMember(choices).description(""));
-}
-
-bool DisplayOptions::isColored() const
-{
-    return isColorWanted(choices.at(color_));
+    color_.addTo(parser);
 }
 
 } // namespace Tools

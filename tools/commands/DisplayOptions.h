@@ -4,10 +4,10 @@
 
 #pragma once
 
+#include "tools/commands/ColorOption.h"
 #include "tools/output/Terminal.h"
 
 #include <cstddef>
-#include <string>
 
 namespace CLI {
 class App;
@@ -21,12 +21,12 @@ public:
     void addTo(CLI::App& parser);
 
     bool isJson() const { return isJson_; }
-    bool isColored() const;
+    bool isColored() const { return color_.isColored(); }
     std::size_t width() const { return outputWidth(); }
 
 private:
     bool isJson_ = false;
-    std::string color_ = "auto";
+    ColorOption color_;
 };
 
 } // namespace Tools

@@ -1,9 +1,10 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
+#include "host/broker/Instance.h"
 #include "tools/EmptyMachine.h"
+#include "tools/ObjectSearch.h"
 #include "tools/SourceOptions.h"
 #include "tools/cim/ProviderClient.h"
-#include "tools/cim/SensorView.h"
 #include "tools/commands/Commands.h"
 #include "tools/commands/DisplayOptions.h"
 #include "tools/output/JsonDocument.h"
@@ -12,38 +13,18 @@
 
 #include <CLI/CLI.hpp>
 
-#include <stdexcept>
-
 namespace Tools {
 
 namespace {
 
-using Instances = std::vector<const Host::Instance*>;
-
-Instances named(const Instances& sensors, std::string_view name)
-{
-    Instances found;
-    for (const Host::Instance* const sensor : sensors)
-        if (SensorView(*sensor).name() == name)
-            found.push_back(sensor);
-    return found;
-}
-
-[[noreturn]] void refuseAmbiguous(const std::string& name, const Instances& sensors)
-{
-    std::string text = "several sensors are named \"" + name + "\"; give one of their DeviceIDs:";
-    for (const Host::Instance* const sensor : sensors)
-        text.append(" \"").append(SensorView(*sensor).deviceId()).append("\"");
-    throw std::runtime_error(text);
-}
-
 class GetCommand : public Command {
 public:
     explicit GetCommand(CLI::App& tool)
-        : Command(tool, "get", "Show one sensor in full, with the meanings of its codes")
+        : Command(tool, "get", "Show one object in full, with the meanings of its codes")
     {
         parser()
-            .add_option("DEVICEID", wanted_, "Its DeviceID, or its name when no other has the same")
+            .add_option(
+                "OBJECT", wanted_, "Its DeviceID, InstanceID, object path or unambiguous name")
             ->required()
             ->type_name("");
         source_.addModel(parser());
@@ -57,39 +38,23 @@ public:
         bool isEmpty = false;
         if (show(out, isEmpty))
             return ExitCode::success;
-        if (isEmpty) {
-            checkMachineIsEmpty();
-            return complainOfEmptyMachine(source_.model());
-        }
-        complain("no sensor has the DeviceID or the name \"" + wanted_ + "\"");
-        return ExitCode::nothingFound;
+        return complainOfNoObject(wanted_, isEmpty, source_.model());
     }
 
 private:
-    // False when there is no such sensor; isEmpty says whether there are none at all.
+    // False when there is no such object; isEmpty says whether there are no sensors at all.
     bool show(Output& out, bool& isEmpty) const
     {
-        ProviderClient provider(source_.providerFile());
-        if (const Host::Instance* const sensor = provider.sensor(wanted_)) {
-            print(out, *sensor);
-            return true;
-        }
-        const Instances all = provider.sensors();
-        isEmpty = all.empty();
-        const Instances found = named(all, wanted_);
-        if (found.size() > 1)
-            refuseAmbiguous(wanted_, found);
-        for (const Host::Instance* const sensor : found)
-            print(out, *sensor);
-        return !found.empty();
-    }
-
-    void print(Output& out, const Host::Instance& sensor) const
-    {
+        ProviderClient provider(source_.providerFiles());
+        const ObjectFound found = findObject(provider, wanted_);
+        isEmpty = found.isMachineEmpty;
+        if (found.object == nullptr)
+            return false;
         if (display_.isJson())
-            writeJson(out, sensorClass, {&sensor});
+            writeJson(out, found.object->className(), {found.object});
         else
-            out.write(propertyList(sensor, display_.width(), display_.isColored()));
+            out.write(propertyList(*found.object, display_.width(), display_.isColored()));
+        return true;
     }
 
     std::string wanted_;

@@ -2,10 +2,12 @@
 
 #include "tools/EmptyMachine.h"
 #include "tools/SourceOptions.h"
+#include "tools/UsageError.h"
 #include "tools/cim/ProviderClient.h"
 #include "tools/commands/Commands.h"
 #include "tools/commands/DisplayOptions.h"
 #include "tools/output/JsonDocument.h"
+#include "tools/output/ObjectTable.h"
 #include "tools/output/Output.h"
 #include "tools/output/SensorTable.h"
 
@@ -18,13 +20,21 @@ namespace {
 constexpr const char* footer =
     "LOWER and UPPER are limits in the reading's unit, rounded to hundredths:\n"
     "warning/critical/fatal, with - for one that the sensor lacks. A reading of -\n"
-    "means that the sensor delivers none.";
+    "means that the sensor delivers none.\n"
+    "\n"
+    "CLASS may be ZUMLO_ComputerSystem, ZUMLO_SensorSystemDevice,\n"
+    "ZUMLO_SensorElementCapabilities, ZUMLO_SensorEnabledLogicalElementCapabilities,\n"
+    "or a class that these are derived from.";
 
 class ListCommand : public Command {
 public:
     explicit ListCommand(CLI::App& tool)
         : Command(tool, "list", "Show all sensors with their readings, states and limits")
     {
+        parser()
+            .add_option(
+                "CLASS", className_, "Show the objects of this class instead of the sensors")
+            ->type_name("");
         source_.addModel(parser());
         source_.addProvider(parser());
         display_.addTo(parser());
@@ -36,27 +46,47 @@ public:
         source_.selectMachine();
         if (show(out))
             return ExitCode::success;
-        checkMachineIsEmpty();
+        if (className_ == sensorClass)
+            checkMachineIsEmpty();
+        else
+            countSensors(); // throws when providers found nothing because they cannot read it
         if (display_.isJson())
-            writeJson(out, sensorClass, {});
-        return complainOfEmptyMachine(source_.model());
+            writeJson(out, className_, {});
+        if (className_ == sensorClass)
+            return complainOfEmptyMachine(source_.model());
+        complain("there are no objects of the class " + className_);
+        return ExitCode::nothingFound;
     }
 
 private:
     // False when there are none.
-    bool show(Output& out) const
+    bool show(Output& out)
     {
-        ProviderClient provider(source_.providerFile());
-        const auto sensors = provider.sensors();
-        if (sensors.empty())
+        ProviderClient provider(source_.providerFiles());
+        className_ = declared(provider);
+        const Instances objects = provider.instances(className_);
+        if (objects.empty())
             return false;
         if (display_.isJson())
-            writeJson(out, sensorClass, sensors);
+            writeJson(out, className_, objects);
+        else if (className_ == sensorClass)
+            out.write(sensorTable(objects, display_.width(), display_.isColored()));
         else
-            out.write(sensorTable(sensors, display_.width(), display_.isColored()));
+            out.write(objectTable(objects, display_.width(), display_.isColored()));
         return true;
     }
 
+    std::string declared(const ProviderClient& provider) const
+    {
+        if (auto className = provider.declaredClass(className_))
+            return *std::move(className);
+        std::string text = "unknown class \"" + className_ + "\"; there are";
+        for (const std::string& served : provider.servedClasses())
+            text.append(" ").append(served);
+        throw UsageError(text);
+    }
+
+    std::string className_ = sensorClass;
     SourceOptions source_;
     DisplayOptions display_;
 };

@@ -4,8 +4,10 @@
 
 #include "host/broker/Array.h"
 #include "host/broker/Instance.h"
+#include "host/broker/ObjectPath.h"
 #include "host/broker/String.h"
 #include "host/broker/Text.h"
+#include "tools/cim/ObjectNames.h"
 #include "tools/cim/SensorView.h"
 #include "tools/cim/ValueMaps.h"
 #include "tools/output/Emphasis.h"
@@ -45,6 +47,8 @@ std::string shown(const SensorView& sensor, std::string_view property, const Hos
 {
     if (const auto text = value.text())
         return printable(*text);
+    if (const Host::ObjectPath* const path = value.path())
+        return printable(path->toText());
     const std::string meaning = meaningIn(sensor, property, value);
     const std::string number = printable(Host::toText(value));
     return meaning.empty() ? number : number + " (" + meaning + ")";
@@ -95,7 +99,7 @@ std::string propertyList(const Host::Instance& instance, std::size_t width, bool
     column += 2 * margin;
 
     const SensorView sensor(instance);
-    std::string text = emphasized(printable(sensor.name()), Emphasis::heading, isColored) + "\n";
+    std::string text = emphasized(printable(nameOf(instance)), Emphasis::heading, isColored) + "\n";
     for (const Host::NamedValue& property : instance.properties()) {
         if (property.value.isNull())
             continue;

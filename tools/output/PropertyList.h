@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// One sensor in full.
+// One object in full.
 
 #pragma once
 
@@ -13,9 +13,9 @@ class Instance;
 
 namespace Tools {
 
-// The sensor's name, then a line for each property in the order of the instance, with the
+// The object's name, then a line for each property in the order of the instance, with the
 // meanings of codes and scaled numbers beside them. Values that are wider than the width go on
 // in the next line.
-std::string propertyList(const Host::Instance& sensor, std::size_t width, bool isColored);
+std::string propertyList(const Host::Instance& instance, std::size_t width, bool isColored);
 
 } // namespace Tools

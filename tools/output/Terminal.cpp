@@ -5,8 +5,11 @@
 #include <sys/ioctl.h>
 #include <unistd.h>
 
+#include <algorithm>
+#include <cctype>
 #include <charconv>
 #include <cstdlib>
+#include <string>
 #include <string_view>
 
 namespace Tools {
@@ -43,6 +46,21 @@ std::size_t outputWidth()
     if (::ioctl(STDOUT_FILENO, TIOCGWINSZ, &size) == 0 && size.ws_col != 0)
         return size.ws_col;
     return usualWidth;
+}
+
+bool isUtf8Locale()
+{
+    // In the order of precedence.
+    for (const char* const variable : {"LC_ALL", "LC_CTYPE", "LANG"}) {
+        std::string locale(setting(variable));
+        if (locale.empty())
+            continue;
+        std::erase(locale, '-');
+        std::transform(locale.begin(), locale.end(), locale.begin(),
+            [](unsigned char c) { return static_cast<char>(std::tolower(c)); });
+        return locale.find(".utf8") != std::string::npos;
+    }
+    return false;
 }
 
 bool isColorWanted(ColorChoice choice)

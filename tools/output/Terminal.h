@@ -17,6 +17,9 @@ inline constexpr std::size_t unlimited = static_cast<std::size_t>(-1);
 // terminal does not know it), else unlimited.
 std::size_t outputWidth();
 
+// Whether the user's locale, as the environment names it, is one of UTF-8.
+bool isUtf8Locale();
+
 // Automatic: on a terminal that is not dumb, unless NO_COLOR is set.
 bool isColorWanted(ColorChoice choice);
 

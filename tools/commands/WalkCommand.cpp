@@ -1,0 +1,114 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "host/broker/Instance.h"
+#include "host/broker/ObjectPath.h"
+#include "tools/EmptyMachine.h"
+#include "tools/ObjectSearch.h"
+#include "tools/SourceOptions.h"
+#include "tools/cim/AssociationGraph.h"
+#include "tools/cim/ProviderClient.h"
+#include "tools/commands/ColorOption.h"
+#include "tools/commands/Commands.h"
+#include "tools/output/ObjectTree.h"
+#include "tools/output/Output.h"
+#include "tools/output/Terminal.h"
+
+#include <CLI/CLI.hpp>
+
+#include <stdexcept>
+
+namespace Tools {
+
+namespace {
+
+constexpr const char* footer =
+    "Each line names an object by its role in an association, with the class of the\n"
+    "association. ... stands where more was shown before.";
+
+class WalkCommand : public Command {
+public:
+    explicit WalkCommand(CLI::App& tool)
+        : Command(tool, "walk", "Follow the associations from the computer system down")
+    {
+        parser()
+            .add_option("OBJECT", wanted_, "Begin at this one; OBJECT as for sensorctl get")
+            ->type_name("");
+        source_.addModel(parser());
+        source_.addProvider(parser());
+        color_.addTo(parser());
+        parser().footer(footer);
+    }
+
+    ExitCode run(Output& out) override
+    {
+        source_.selectMachine();
+        bool isMachineEmpty = false;
+        const ExitCode code = show(out, isMachineEmpty);
+        if (code == ExitCode::nothingFound)
+            return complainOfNothing(isMachineEmpty);
+        // A provider that cannot read the machine shows one without sensors.
+        countSensors();
+        return code;
+    }
+
+private:
+    ExitCode show(Output& out, bool& isMachineEmpty) const
+    {
+        ProviderClient provider(source_.providerFiles());
+        const Instances roots = findRoots(provider, isMachineEmpty);
+        if (roots.empty())
+            return ExitCode::nothingFound;
+        AssociationGraph graph;
+        const bool isWhole = addAssociations(provider, graph);
+        const TreeStyle style = {outputWidth(), color_.isColored(), isUtf8Locale()};
+        for (const Host::Instance* const root : roots)
+            writeTree(out, graph, graph.indexOf(root->objectPath()), style);
+        return isWhole ? ExitCode::success : ExitCode::failure;
+    }
+
+    Instances findRoots(ProviderClient& provider, bool& isMachineEmpty) const
+    {
+        if (!wanted_)
+            return provider.instances(computerSystemClass);
+        const ObjectFound found = findObject(provider, *wanted_);
+        isMachineEmpty = found.isMachineEmpty;
+        return found.object == nullptr ? Instances{} : Instances{found.object};
+    }
+
+    // What one class fails to tell takes nothing from the tree of the others; false then.
+    static bool addAssociations(ProviderClient& provider, AssociationGraph& graph)
+    {
+        bool isWhole = true;
+        for (const std::string& className : provider.associationClasses()) {
+            try {
+                for (const Host::Instance* const each : provider.instances(className))
+                    graph.add(*each);
+            } catch (const std::runtime_error& error) {
+                complain(className + ": " + error.what());
+                isWhole = false;
+            }
+        }
+        return isWhole;
+    }
+
+    ExitCode complainOfNothing(bool isMachineEmpty) const
+    {
+        if (wanted_)
+            return complainOfNoObject(*wanted_, isMachineEmpty, source_.model());
+        complain("there is no computer system");
+        return ExitCode::nothingFound;
+    }
+
+    std::optional<std::string> wanted_;
+    SourceOptions source_;
+    ColorOption color_;
+};
+
+} // namespace
+
+std::unique_ptr<Command> makeWalkCommand(CLI::App& tool)
+{
+    return std::make_unique<WalkCommand>(tool);
+}
+
+} // namespace Tools

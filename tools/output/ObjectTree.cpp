@@ -1,0 +1,119 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "tools/output/ObjectTree.h"
+
+#include "host/broker/ObjectPath.h"
+#include "tools/cim/ObjectNames.h"
+#include "tools/output/Emphasis.h"
+#include "tools/output/Utf8.h"
+
+#include <string>
+#include <vector>
+
+namespace Tools {
+
+namespace {
+
+using Index = AssociationGraph::Index;
+using Link = AssociationGraph::Link;
+
+// What stands before an object, and before those below it. All are equally wide.
+struct Branch {
+    const char* object;
+    const char* below;
+};
+
+constexpr Branch utf8Branch = {"├─ ", "│  "};
+constexpr Branch utf8LastBranch = {"└─ ", "   "};
+constexpr Branch asciiBranch = {"|- ", "|  "};
+constexpr Branch asciiLastBranch = {"`- ", "   "};
+
+class TreeWriter {
+public:
+    TreeWriter(Output& out, const AssociationGraph& graph, Index root, const TreeStyle& style)
+        : out_(out), graph_(graph), style_(style), distances_(graph.distancesFrom(root)),
+          isDescended_(distances_.size(), false)
+    {
+        const Host::ObjectPath& path = graph.path(root);
+        writeLine("", shortName(path), " (" + std::string(path.className()) + ")");
+        writeBelow(root, "");
+    }
+
+private:
+    // A link that the tree shows below the object: it does not lead back.
+    bool isShown(Index object, const Link& link) const
+    {
+        return link.target != object && distances_[link.target] >= distances_[object];
+    }
+
+    std::vector<const Link*> shownLinks(Index object) const
+    {
+        std::vector<const Link*> shown;
+        for (const Link& link : graph_.links(object))
+            if (isShown(object, link))
+                shown.push_back(&link);
+        return shown;
+    }
+
+    // As deep as the farthest object, whatever circles there are: each step leads away.
+    void writeBelow(Index object, const std::string& indent)
+    {
+        isDescended_[object] = true;
+        const std::vector<const Link*> links = shownLinks(object);
+        for (std::size_t i = 0; i < links.size(); ++i) {
+            const Branch& branch = branchOf(i + 1 == links.size());
+            writeLink(object, *links[i], indent + branch.object, indent + branch.below);
+        }
+    }
+
+    void writeLink(
+        Index object, const Link& link, const std::string& before, const std::string& indentBelow)
+    {
+        const bool leadsAway = distances_[link.target] > distances_[object];
+        const bool isRepeated = isDescended_[link.target];
+        const bool hidesSome = (isRepeated || !leadsAway) && !shownLinks(link.target).empty();
+        writeLine(before, link.role + " " + shortName(graph_.path(link.target)),
+            " (" + link.associationClass + ")" + (hidesSome ? " ..." : ""));
+        if (leadsAway && !isRepeated)
+            writeBelow(link.target, indentBelow);
+    }
+
+    const Branch& branchOf(bool isLast) const
+    {
+        if (style_.isUtf8)
+            return isLast ? utf8LastBranch : utf8Branch;
+        return isLast ? asciiLastBranch : asciiBranch;
+    }
+
+    // The remark gives way first when the line is too long.
+    void writeLine(const std::string& before, const std::string& object, const std::string& remark)
+    {
+        const std::string text = before + printable(object);
+        const std::string shown = fitting(text, style_.width);
+        const std::size_t used = displayWidth(shown);
+        const std::size_t room = style_.width > used ? style_.width - used : 0;
+        const std::string rest = room == 0 ? "" : fitting(printable(remark), room);
+        out_.write(shown + emphasized(rest, Emphasis::faint, style_.isColored) + "\n");
+    }
+
+    static std::string fitting(const std::string& text, std::size_t width)
+    {
+        return displayWidth(text) <= width ? text : cutToWidth(text, width);
+    }
+
+    Output& out_;
+    const AssociationGraph& graph_;
+    const TreeStyle& style_;
+    std::vector<std::size_t> distances_;
+    std::vector<bool> isDescended_;
+};
+
+} // namespace
+
+void writeTree(Output& out, const AssociationGraph& graph, AssociationGraph::Index root,
+    const TreeStyle& style)
+{
+    TreeWriter(out, graph, root, style);
+}
+
+} // namespace Tools
