@@ -44,6 +44,12 @@ struct FailureTexts {
     const char* message; // null for no message line
 };
 
+// How the far ends of references could not be fetched.
+struct FetchFailure {
+    const char* text; // of the message line; null when they could
+    bool hasExitMark = true;
+};
+
 // One request to an association provider: its marks and how it reports failures. The trace
 // lines it writes carry the caller's line.
 class AssociationRequest {
@@ -104,8 +110,8 @@ public:
 
     // Hands over one association for each far end, with the source at its other end, and ends
     // the request. `fetch(factory, target, leadsToSensors, farEnds, status)` finds the far ends;
-    // it returns the text of its failure, null when there is none. `withoutTarget` is the failure
-    // of a source whose class has no far end.
+    // it returns its FetchFailure. `withoutTarget` is the failure of a source whose class has no
+    // far end.
     template <typename Fetch>
     CMPIStatus references(Answer answer, const CMPIResult* rslt, const CMPIObjectPath* op,
         const char* withoutTarget, const Fetch& fetch, unsigned line = __builtin_LINE()) const
@@ -123,11 +129,13 @@ public:
         if (const CMPIObjectPath* const path = newPath(broker_, op, served_.name, &status)) {
             // Asked once: a broker that answers differently later would turn the pairs round.
             const bool leadsToSensors = isOfClass(target, SensorClass, &status);
-            if (const char* const failure =
-                    fetch(factory, target, leadsToSensors, farEnds, &status))
-                marks_.failure(failure, line);
-            else
+            const FetchFailure failure = fetch(factory, target, leadsToSensors, farEnds, &status);
+            if (failure.text == nullptr)
                 returnReferences(answer, rslt, op, path, leadsToSensors, farEnds, &status);
+            else
+                marks_.failure(failure.text, line);
+            if (!failure.hasExitMark)
+                return status;
         }
         marks_.exit(line);
         return status;

@@ -57,7 +57,7 @@ CMPIStatus references(const char* function, Answer answer, const CMPIResult* rsl
     return request.references(answer, rslt, op, withoutTarget,
         [op](SensorFactory& factory, const CMPIObjectPath* target, bool leadsToSensors,
             std::vector<CMPIObjectPath*>& farEnds, CMPIStatus* status) {
-            return fetchPaths(factory, op, target, leadsToSensors, farEnds, status);
+            return FetchFailure{fetchPaths(factory, op, target, leadsToSensors, farEnds, status)};
         });
 }
 

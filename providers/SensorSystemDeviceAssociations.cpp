@@ -37,9 +37,11 @@ bool returnSystems(Answer answer, const CMPIContext* ctx, const CMPIResult* rslt
     if (status->rc != CMPI_RC_OK)
         return false;
     forEachElement(systems, status, [&](const CMPIData& element) {
-        if (const CMPIInstance* const instance = instanceOf(element))
+        const CMPIInstance* const instance = wantsInstances ? instanceOf(element) : nullptr;
+        const CMPIObjectPath* const path = wantsInstances ? nullptr : pathOf(element);
+        if (instance != nullptr)
             CMReturnInstance(rslt, instance);
-        else if (const CMPIObjectPath* const path = pathOf(element))
+        else if (path != nullptr)
             CMReturnObjectPath(rslt, path);
         return true;
     });
@@ -98,26 +100,25 @@ CMPIStatus associators(const char* function, Answer answer, const CMPIContext* c
     return status;
 }
 
-// The far ends of the source's associations, of the target's class. The text of the failure,
-// null when there is none.
-const char* fetchFarEnds(const CMPIContext* ctx, const CMPIObjectPath* op,
+// The far ends of the source's associations, of the target's class. A failed up-call leaves the
+// exit mark out, as it does for associated objects.
+FetchFailure fetchFarEnds(const CMPIContext* ctx, const CMPIObjectPath* op,
     const CMPIObjectPath* target, bool leadsToSensors, SensorFactory& factory,
     std::vector<CMPIObjectPath*>& farEnds, CMPIStatus* status)
 {
     if (leadsToSensors)
-        return factory.getAllSensorCMPIObjPaths(broker, op, farEnds, status) ? SensorPathsFailed
-                                                                             : nullptr;
+        return {factory.getAllSensorCMPIObjPaths(broker, op, farEnds, status) ? SensorPathsFailed
+                                                                              : nullptr};
     if (!isOfClass(target, ComputerSystemClass, status))
-        return nullptr;
+        return {nullptr};
     const CMPIEnumeration* const systems = CBEnumInstanceNames(broker, ctx, target, status);
-    if (status->rc != CMPI_RC_OK)
-        return UpcallFailed;
-    const bool isWhole = forEachElement(systems, status, [&](const CMPIData& element) {
-        if (CMPIObjectPath* const system = pathOf(element))
-            farEnds.push_back(system);
-        return true;
-    });
-    return isWhole ? nullptr : UpcallFailed;
+    const bool isWhole =
+        status->rc == CMPI_RC_OK && forEachElement(systems, status, [&](const CMPIData& element) {
+            if (CMPIObjectPath* const system = pathOf(element))
+                farEnds.push_back(system);
+            return true;
+        });
+    return {isWhole ? nullptr : UpcallFailed, isWhole};
 }
 
 CMPIStatus references(const char* function, Answer answer, const CMPIContext* ctx,
