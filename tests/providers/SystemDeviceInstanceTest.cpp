@@ -1,0 +1,309 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// The instances of ZUMLO_SensorSystemDevice: each computer system with each sensor.
+
+#include "providers/SensorSystemDevice.h"
+#include "tests/providers/AssociationTest.h"
+
+#include <gmock/gmock.h>
+
+namespace {
+
+using namespace Testing;
+using ::testing::ElementsAre;
+using ::testing::IsEmpty;
+
+constexpr const char* Class = "ZUMLO_SensorSystemDevice";
+constexpr const char* Provider = "SensorSystemDeviceProvider";
+constexpr const char* NoKeyText = "At least one key should be passed";
+
+class SystemDeviceInstanceTest : public AssociationTest {
+protected:
+    explicit SystemDeviceInstanceTest(const std::vector<ScriptedNode>& nodes = ThreeSensors,
+        const std::vector<std::string>& systems = {"host", "guest"})
+        : AssociationTest(SensorSystemDeviceProvider_Create_InstanceMI,
+              SensorSystemDeviceProvider_Create_AssociationMI, nodes, systems)
+    {
+    }
+
+    Host::ObjectPath& pairPath(const Host::Value& group, const Host::Value& part)
+    {
+        Host::ObjectPath& made = path(Class);
+        made.addKey("GroupComponent", group);
+        made.addKey("PartComponent", part);
+        return made;
+    }
+
+    Host::ObjectPath& pairPath(const Host::ObjectPath& group, const Host::ObjectPath& part)
+    {
+        return pairPath(Host::Value::of(group), Host::Value::of(part));
+    }
+
+    std::vector<std::string> pairs() const
+    {
+        return AssociationTest::pairs("GroupComponent", "PartComponent");
+    }
+
+    // GetInstance with a result of its own.
+    std::vector<std::string> got(const Host::ObjectPath& ref)
+    {
+        Host::CollectedResult found;
+        Host::Result into(found);
+        expectOk(instanceMI_->ft->getInstance(
+            instanceMI_, context(), into.handle(), ref.handle(), nullptr));
+        EXPECT_TRUE(found.isDone());
+        std::vector<std::string> names;
+        for (const Host::Instance* const instance : found.instances())
+            names.push_back(nameOf(*instance->property("GroupComponent")->path()) + " " +
+                            nameOf(*instance->property("PartComponent")->path()));
+        return names;
+    }
+
+    // That the one up-call came with the request's context, for the class of systems.
+    void expectUpcall(const std::string& path)
+    {
+        ASSERT_EQ(systems_.calls.size(), 1U);
+        EXPECT_EQ(systems_.calls[0].operation, "enumerateInstanceNames");
+        EXPECT_EQ(systems_.calls[0].path, path);
+        EXPECT_EQ(systems_.calls[0].context, context());
+    }
+};
+
+class SystemDeviceOfNoSystemTest : public SystemDeviceInstanceTest {
+protected:
+    SystemDeviceOfNoSystemTest() : SystemDeviceInstanceTest(ThreeSensors, {}) {}
+};
+
+class SystemDeviceOfNoSensorTest : public SystemDeviceInstanceTest {
+protected:
+    SystemDeviceOfNoSensorTest() : SystemDeviceInstanceTest({}) {}
+};
+
+class SystemDeviceOfOnePairTest : public SystemDeviceInstanceTest {
+protected:
+    SystemDeviceOfOnePairTest() : SystemDeviceInstanceTest({ThreeSensors[0]}, {"host"}) {}
+};
+
+const std::vector<std::string> AllPairs = {
+    "host A:/1", "host B:/2", "host C:/3", "guest A:/1", "guest B:/2", "guest C:/3"};
+
+// ---- EnumInstanceNames ----
+
+TEST_F(SystemDeviceInstanceTest, namesArePairsSystemBySystem)
+{
+    expectOk(enumerateNames(path(Class)));
+    EXPECT_EQ(pairs(), AllPairs);
+    EXPECT_TRUE(answer_.isDone());
+    EXPECT_THAT(messages_, IsEmpty());
+    expectUpcall("root/cimv2:ZUMLO_ComputerSystem");
+}
+
+TEST_F(SystemDeviceInstanceTest, aNameIsAPathInTheRequestsNamespaceOnThisSystem)
+{
+    systems_.nameSpace = "root/elsewhere";
+    expectOk(enumerateNames(path(Class, {}, "root/other")));
+    expectUpcall("root/other:ZUMLO_ComputerSystem");
+    ASSERT_EQ(answer_.paths().size(), 6U);
+    const Host::ObjectPath& fifth = *answer_.paths()[4];
+    EXPECT_EQ(fifth.className(), Class);
+    EXPECT_EQ(fifth.nameSpace(), "root/other");
+    EXPECT_EQ(fifth.host(), systemName_);
+    EXPECT_THAT(describe(fifth.keys()), // the system in the request's namespace, too
+        ElementsAre("GroupComponent = ref " + system("guest", "root/other").toText(),
+            "PartComponent = ref " + sensor("B:/2", "root/other").toText()));
+}
+
+TEST_F(SystemDeviceOfOnePairTest, hasOneName)
+{
+    expectOk(enumerateNames(path(Class)));
+    EXPECT_THAT(pairs(), ElementsAre("host C:/3"));
+}
+
+TEST_F(SystemDeviceOfNoSystemTest, namesAreAClosedEmptyAnswer)
+{
+    expectOk(enumerateNames(path(Class)));
+    expectNothing(true);
+    EXPECT_THAT(messages_, IsEmpty());
+}
+
+TEST_F(SystemDeviceOfNoSensorTest, namesAreAClosedEmptyAnswer)
+{
+    expectOk(enumerateNames(path(Class)));
+    expectNothing(true);
+}
+
+TEST_F(SystemDeviceInstanceTest, systemsThatNobodyServesAreAnOpenEmptyAnswerThatSaysSo)
+{
+    for (const CMPIrc refusal : {CMPI_RC_ERR_NOT_SUPPORTED, CMPI_RC_ERR_FAILED}) {
+        systems_.refusal = refusal;
+        const CMPIStatus status = enumerateNames(path(Class));
+        EXPECT_EQ(status.rc, CMPI_RC_OK);
+        EXPECT_EQ(textOf(status.msg), "CBEnumInstanceNames Failed for the ZUMLO_ComputerSystem");
+        expectNothing(false);
+        EXPECT_THAT(messages_, IsEmpty());
+    }
+}
+
+TEST_F(SystemDeviceInstanceTest, elementsThatAreNoPathsArePassedOverInNames)
+{
+    systems_.isMixed = true;
+    expectOk(enumerateNames(path(Class)));
+    EXPECT_EQ(pairs(), AllPairs);
+    EXPECT_TRUE(answer_.isDone());
+}
+
+// ---- EnumInstances ----
+
+TEST_F(SystemDeviceInstanceTest, instancesArePairsSystemBySystem)
+{
+    systems_.nameSpace = "root/elsewhere";
+    expectOk(enumerate(path(Class, {}, "root/other")));
+    EXPECT_EQ(pairs(), AllPairs);
+    EXPECT_TRUE(answer_.isDone());
+    EXPECT_THAT(messages_, IsEmpty());
+    expectUpcall("root/other:ZUMLO_ComputerSystem");
+    const Host::Instance& last = *answer_.instances().back();
+    EXPECT_EQ(last.className(), Class);
+    EXPECT_EQ(last.objectPath().nameSpace(), "root/other");
+    EXPECT_EQ(last.objectPath().host(), systemName_);
+    EXPECT_THAT(describe(last.properties()),
+        ElementsAre("GroupComponent = ref " + system("guest", "root/other").toText(),
+            "PartComponent = ref " + sensor("C:/3", "root/other").toText()));
+}
+
+TEST_F(SystemDeviceInstanceTest, theFilterKeepsBothReferencesWhateverTheListNames)
+{
+    broker_.setClassInformation(nullptr); // so that the filter's own keys are known alone
+    const char* properties[] = {"Nothing", nullptr};
+    expectOk(enumerate(path(Class), properties));
+    ASSERT_EQ(answer_.instances().size(), 6U);
+    for (const Host::Instance* const instance : answer_.instances())
+        EXPECT_THAT(
+            namesOf(instance->properties()), ElementsAre("GroupComponent", "PartComponent"));
+}
+
+TEST_F(SystemDeviceOfNoSystemTest, instancesAreAClosedEmptyAnswer)
+{
+    expectOk(enumerate(path(Class)));
+    expectNothing(true);
+}
+
+TEST_F(SystemDeviceOfNoSensorTest, instancesAreAClosedEmptyAnswer)
+{
+    expectOk(enumerate(path(Class)));
+    expectNothing(true);
+}
+
+TEST_F(SystemDeviceInstanceTest, systemsThatNobodyServesHaveNoInstancesInAClosedResult)
+{
+    systems_.refusal = CMPI_RC_ERR_NOT_SUPPORTED;
+    expectOk(enumerate(path(Class)));
+    expectNothing(true);
+    EXPECT_THAT(messages_, IsEmpty());
+}
+
+TEST_F(SystemDeviceInstanceTest, elementsThatAreNoPathsArePassedOverInInstances)
+{
+    systems_.isMixed = true;
+    expectOk(enumerate(path(Class)));
+    EXPECT_EQ(pairs(), AllPairs);
+}
+
+TEST_F(SystemDeviceInstanceTest, theBuilderKeepsWhatIsThereAndSaysWhetherItFailed)
+{
+    using Vorn::SensorProfileProvider::sensorSystemDeviceCMPIInstances;
+    std::vector<CMPIInstance*> instances = {nullptr};
+    const CMPIObjectPath* const ref = path(Class).handle();
+    EXPECT_EQ(sensorSystemDeviceCMPIInstances(ref, nullptr, context(), instances), 0);
+    EXPECT_EQ(instances.size(), 7U);
+    EXPECT_EQ(instances[0], nullptr);
+    systems_.refusal = CMPI_RC_ERR_FAILED;
+    EXPECT_EQ(sensorSystemDeviceCMPIInstances(ref, nullptr, context(), instances), 1);
+    systems_.refusal = CMPI_RC_OK;
+    const ScriptedMachine empty;
+    EXPECT_EQ(sensorSystemDeviceCMPIInstances(ref, nullptr, context(), instances), 1);
+    systems_.names.clear();
+    EXPECT_EQ(sensorSystemDeviceCMPIInstances(ref, nullptr, context(), instances), 0);
+    EXPECT_EQ(instances.size(), 7U);
+}
+
+// ---- GetInstance ----
+
+TEST_F(SystemDeviceInstanceTest, anInstanceIsFoundByItsReferences)
+{
+    expectOk(get(pairPath(system("guest"), sensor("B:/2"))));
+    EXPECT_THAT(pairs(), ElementsAre("guest B:/2"));
+    EXPECT_TRUE(answer_.isDone());
+    expectUpcall("root/cimv2:ZUMLO_ComputerSystem");
+}
+
+TEST_F(SystemDeviceInstanceTest, theFirstOfEqualInstancesIsReturnedAlone)
+{
+    systems_.names = {"host", "host"};
+    EXPECT_THAT(got(pairPath(system("host"), sensor("A:/1"))), ElementsAre("host A:/1"));
+}
+
+TEST_F(SystemDeviceInstanceTest, neitherOrderNorLetterCaseNorHostsMatter)
+{
+    Host::ObjectPath& group = path("zumlo_computersystem",
+        {{"name", "guest"}, {"creationclassname", SystemClass}}, "ROOT/CIMV2");
+    group.setHost("elsewhere");
+    Host::ObjectPath& part = path("ZUMLO_NUMERICSENSOR",
+        {{"SYSTEMNAME", systemName_}, {"SYSTEMCREATIONCLASSNAME", SystemClass},
+            {"DEVICEID", "C:/3"}, {"CREATIONCLASSNAME", SensorClass}});
+    part.setNameSpace(nullptr);
+    Host::ObjectPath& ref = path("zumlo_sensorsystemdevice");
+    ref.addKey("partcomponent", Host::Value::of(part));
+    ref.addKey("groupcomponent", Host::Value::of(group));
+    EXPECT_THAT(got(ref), ElementsAre("guest C:/3"));
+}
+
+TEST_F(SystemDeviceInstanceTest, otherValuesAreAClosedEmptyAnswer)
+{
+    EXPECT_THAT(got(pairPath(system("other"), sensor("A:/1"))), IsEmpty());
+    EXPECT_THAT(got(pairPath(system("Guest"), sensor("A:/1"))), IsEmpty());
+    EXPECT_THAT(got(pairPath(system("host"), sensor("D:/4"))), IsEmpty());
+    EXPECT_THAT(got(pairPath(system("host", "root/other"), sensor("A:/1"))), IsEmpty());
+    EXPECT_THAT(got(pairPath(sensor("A:/1"), system("host"))), IsEmpty());
+    EXPECT_THAT(got(path(Class, {{"Other", "x"}})), IsEmpty());
+}
+
+TEST_F(SystemDeviceInstanceTest, aReferenceOfAnotherTypeFindsNothing)
+{
+    Host::Arena& arena = request_->arena();
+    for (const Host::Value& value : {Host::Value::text(arena, system("host").toText()),
+             Host::Value::integer(CMPI_uint64, 1), Host::Value::integer(CMPI_sint64, 1),
+             Host::Value::boolean(false), Host::Value::null(CMPI_ref), Host::Value::absent()}) {
+        EXPECT_THAT(got(pairPath(value, Host::Value::of(sensor("A:/1")))), IsEmpty());
+        EXPECT_THAT(got(pairPath(Host::Value::of(system("host")), value)), IsEmpty());
+    }
+    Host::ObjectPath& part = path(
+        SensorClass, {{"CreationClassName", SensorClass}, {"SystemCreationClassName", SystemClass},
+                         {"SystemName", systemName_}});
+    part.addKey("DeviceID", Host::Value::integer(CMPI_uint64, 1));
+    EXPECT_THAT(got(pairPath(system("host"), part)), IsEmpty());
+}
+
+TEST_F(SystemDeviceInstanceTest, aPathWithoutKeysIsRefusedInAClosedResult)
+{
+    expectFailure(get(path(Class)), NoKeyText);
+    expectNothing(true);
+    EXPECT_THAT(messages_, ElementsAre(BrokerMessage{2, Provider, NoKeyText}));
+    EXPECT_TRUE(systems_.calls.empty());
+}
+
+TEST_F(SystemDeviceInstanceTest, aFailedUpcallFindsNothingAndIsOk)
+{
+    systems_.refusal = CMPI_RC_ERR_FAILED;
+    EXPECT_THAT(got(pairPath(system("host"), sensor("A:/1"))), IsEmpty());
+}
+
+TEST_F(SystemDeviceInstanceTest, everyNameThatIsEnumeratedCanBeFetched)
+{
+    expectOk(enumerateNames(path(Class)));
+    ASSERT_EQ(answer_.paths().size(), 6U);
+    for (std::size_t i = 0; i < 6; ++i)
+        EXPECT_THAT(got(*answer_.paths()[i]), ElementsAre(AllPairs[i]));
+}
+
+} // namespace

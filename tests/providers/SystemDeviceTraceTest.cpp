@@ -1,0 +1,230 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// The trace lines of whole requests of ZUMLO_SensorSystemDevice, line by line.
+
+#include "tests/providers/AssociationTest.h"
+#include "tests/providers/RequestTrace.h"
+
+#include <gmock/gmock.h>
+
+namespace {
+
+using namespace Testing;
+using ::testing::ElementsAreArray;
+
+constexpr const char* Class = "ZUMLO_SensorSystemDevice";
+const std::string UpcallFailed = "Call to CBEnumInstances of target Class Failed.";
+
+HandlerLines handler(const std::string& function)
+{
+    return {"SenosrSystemDeviceProvider", "SensorSystemDeviceProvider", function};
+}
+
+HandlerLines request(const std::string& name)
+{
+    return handler("SensorSystemDevice_" + name);
+}
+
+const HandlerLines Builder = handler("sensorSystemDeviceCMPIInstances");
+const Lines Built = builtFactory({"_createSensorMap"});
+const Lines BuiltWithoutSensors = builtFactory({});
+const Lines SensorPaths = operation("getAllSensorCMPIObjPaths");
+
+class SystemDeviceTraceTest : public AssociationTest {
+protected:
+    explicit SystemDeviceTraceTest(
+        const std::vector<ScriptedNode>& nodes = {ThreeSensors[0], ThreeSensors[1]})
+        : AssociationTest(SensorSystemDeviceProvider_Create_InstanceMI,
+              SensorSystemDeviceProvider_Create_AssociationMI, nodes, {"host", "guest"})
+    {
+    }
+};
+
+class SystemDeviceEmptyTraceTest : public SystemDeviceTraceTest {
+protected:
+    SystemDeviceEmptyTraceTest() : SystemDeviceTraceTest({}) {}
+};
+
+// ---- Instances. The sensors are fetched anew for each of the two systems. ----
+
+const Lines Fetched = sequence({counted(), SensorPaths});
+
+TEST_F(SystemDeviceTraceTest, ofEnumeratedNames)
+{
+    const Host::ObjectPath& ref = path(Class);
+    const HandlerLines lines = request("EnumInstanceNames");
+    EXPECT_THAT(traceOf([&] { enumerateNames(ref); }),
+        ElementsAreArray(sequence({lines.entry(), Built, Fetched, Fetched, lines.exit()})));
+}
+
+TEST_F(SystemDeviceEmptyTraceTest, ofNamesWithoutSensors)
+{
+    const Host::ObjectPath& ref = path(Class);
+    const HandlerLines lines = request("EnumInstanceNames");
+    EXPECT_THAT(traceOf([&] { enumerateNames(ref); }),
+        ElementsAreArray(sequence({lines.entry(), BuiltWithoutSensors, Fetched, lines.exit()})));
+}
+
+TEST_F(SystemDeviceTraceTest, ofNamesWithoutAnybodyToServeSystemsHasNoExitMark)
+{
+    systems_.refusal = CMPI_RC_ERR_NOT_SUPPORTED;
+    const Host::ObjectPath& ref = path(Class);
+    EXPECT_THAT(traceOf([&] { enumerateNames(ref); }),
+        ElementsAreArray(sequence({request("EnumInstanceNames").entry(), Built})));
+}
+
+TEST_F(SystemDeviceTraceTest, ofEnumeratedInstances)
+{
+    const Host::ObjectPath& ref = path(Class);
+    const HandlerLines lines = request("EnumInstances");
+    EXPECT_THAT(traceOf([&] { enumerate(ref); }),
+        ElementsAreArray(sequence({lines.entry(), Builder.entry(), Built, counted(), Fetched,
+            Fetched, Builder.exit(), lines.exit()})));
+}
+
+// A builder that breaks off leaves its exit mark out.
+TEST_F(SystemDeviceTraceTest, ofInstancesWithoutAnybodyToServeSystems)
+{
+    systems_.refusal = CMPI_RC_ERR_NOT_SUPPORTED;
+    const Host::ObjectPath& ref = path(Class);
+    const HandlerLines lines = request("EnumInstances");
+    EXPECT_THAT(traceOf([&] { enumerate(ref); }),
+        ElementsAreArray(
+            sequence({lines.entry(), Builder.entry(), Built, counted(), lines.exit()})));
+}
+
+TEST_F(SystemDeviceEmptyTraceTest, ofInstancesWithoutSensors)
+{
+    const Host::ObjectPath& ref = path(Class);
+    const HandlerLines lines = request("EnumInstances");
+    EXPECT_THAT(traceOf([&] { enumerate(ref); }),
+        ElementsAreArray(sequence({lines.entry(), Builder.entry(), BuiltWithoutSensors, counted(),
+            Fetched, lines.exit()})));
+}
+
+TEST_F(SystemDeviceTraceTest, ofAnInstanceSearched)
+{
+    const Host::ObjectPath& ref = path(Class, {{"Other", "x"}});
+    const HandlerLines lines = request("GetInstance");
+    EXPECT_THAT(traceOf([&] { get(ref); }),
+        ElementsAreArray(sequence({lines.entry(), Builder.entry(), Built, counted(), Fetched,
+            Fetched, Builder.exit(), lines.exit()})));
+}
+
+TEST_F(SystemDeviceTraceTest, ofARequestWithoutKeysHasNoFactory)
+{
+    const Host::ObjectPath& ref = path(Class);
+    const HandlerLines lines = request("GetInstance");
+    EXPECT_THAT(traceOf([&] { get(ref); }),
+        ElementsAreArray(sequence(
+            {lines.entry(), lines.failure("At least one key should be passed"), lines.exit()})));
+}
+
+// ---- Associated objects ----
+
+TEST_F(SystemDeviceTraceTest, ofTheAssociatorsOfASensor)
+{
+    const Host::ObjectPath& source = sensor("B:/2");
+    const HandlerLines instances = request("Associators");
+    EXPECT_THAT(traceOf([&] { associators(source, {.resultClass = "CIM_ComputerSystem"}); }),
+        ElementsAreArray(sequence({instances.entry(), Built,
+            lookedUp(Class, "CIM_ComputerSystem", 1221), instances.exit()})));
+    const HandlerLines names = request("AssociatorNames");
+    EXPECT_THAT(traceOf([&] { associatorNames(source, {.associationClass = Class}); }),
+        ElementsAreArray(
+            sequence({names.entry(), Built, lookedUp(Class, "(null)", 1221), names.exit()})));
+}
+
+TEST_F(SystemDeviceTraceTest, ofTheAssociatorsOfASystem)
+{
+    const Host::ObjectPath& source = system("host");
+    const HandlerLines instances = request("Associators");
+    const Lines instance = operation("makeSensorInstance", 269, 737);
+    EXPECT_THAT(traceOf([&] { associators(source); }),
+        ElementsAreArray(
+            sequence({instances.entry(), Built, lookedUp(Class, "(null)", 1205), counted(),
+                around(operation("getAllSensorCMPIInstances"), sequence({instance, instance})),
+                instances.exit()})));
+    const HandlerLines names = request("AssociatorNames");
+    EXPECT_THAT(traceOf([&] { associatorNames(source); }),
+        ElementsAreArray(sequence(
+            {names.entry(), Built, lookedUp(Class, "(null)", 1205), Fetched, names.exit()})));
+}
+
+TEST_F(SystemDeviceTraceTest, ofAResultClassThatIsNotServedHasNoExitMark)
+{
+    const Host::ObjectPath& fromSensor = sensor("B:/2");
+    const Host::ObjectPath& fromSystem = system("host");
+    EXPECT_THAT(traceOf([&] { associators(fromSensor, {.resultClass = "X"}); }),
+        ElementsAreArray(
+            sequence({request("Associators").entry(), Built, lookedUp(Class, "X", 1221)})));
+    EXPECT_THAT(traceOf([&] { associatorNames(fromSystem, {.resultClass = "X"}); }),
+        ElementsAreArray(
+            sequence({request("AssociatorNames").entry(), Built, lookedUp(Class, "X", 1205)})));
+}
+
+TEST_F(SystemDeviceTraceTest, ofASourceWithoutTarget)
+{
+    const Host::ObjectPath& source = capabilities();
+    const Lines lookUp = lookedUp(Class, "(null)", 1259);
+    const auto expected = [&](const std::string& name) {
+        return sequence({request(name).entry(), Built, lookUp, request(name).exit()});
+    };
+    EXPECT_THAT(traceOf([&] { associators(source); }), ElementsAreArray(expected("Associators")));
+    EXPECT_THAT(
+        traceOf([&] { associatorNames(source); }), ElementsAreArray(expected("AssociatorNames")));
+    for (const std::string name : {"References", "ReferenceNames"}) {
+        const HandlerLines lines = request(name);
+        EXPECT_THAT(
+            traceOf([&] { name == "References" ? references(source) : referenceNames(source); }),
+            ElementsAreArray(sequence({lines.entry(), Built, counted(), lookUp,
+                lines.failure("Object Path is NULL in " + name), lines.exit()})));
+    }
+}
+
+TEST_F(SystemDeviceEmptyTraceTest, ofSensorsThatAreNotThere)
+{
+    const Host::ObjectPath& source = system("host");
+    const Lines lookUp = lookedUp(Class, "(null)", 1205);
+    const std::string failed = "getAllSensorCMPIObjPaths failed";
+    const HandlerLines names = request("AssociatorNames");
+    EXPECT_THAT(traceOf([&] { associatorNames(source); }),
+        ElementsAreArray(sequence({names.entry(), BuiltWithoutSensors, lookUp, Fetched,
+            names.failure(failed), names.exit()})));
+    const HandlerLines instances = request("References");
+    EXPECT_THAT(traceOf([&] { references(source); }),
+        ElementsAreArray(sequence({instances.entry(), BuiltWithoutSensors, counted(), lookUp,
+            SensorPaths, instances.failure(failed), instances.exit()})));
+    const HandlerLines paths = request("ReferenceNames");
+    EXPECT_THAT(traceOf([&] { referenceNames(source); }),
+        ElementsAreArray(sequence({paths.entry(), BuiltWithoutSensors, counted(), lookUp,
+            SensorPaths, paths.failure(failed), paths.exit()})));
+}
+
+TEST_F(SystemDeviceTraceTest, ofReferences)
+{
+    const Host::ObjectPath& source = sensor("B:/2");
+    const Lines lookUp = lookedUp(Class, "(null)", 1221);
+    const HandlerLines instances = request("References");
+    EXPECT_THAT(traceOf([&] { references(source, {.resultClass = "not passed on"}); }),
+        ElementsAreArray(
+            sequence({instances.entry(), Built, counted(), lookUp, instances.exit()})));
+    const HandlerLines names = request("ReferenceNames");
+    EXPECT_THAT(traceOf([&] { referenceNames(source, {.resultClass = "not passed on"}); }),
+        ElementsAreArray(sequence({names.entry(), Built, counted(), lookUp, names.exit()})));
+}
+
+TEST_F(SystemDeviceTraceTest, ofARefusedUpcallHasNoExitMark)
+{
+    systems_.refusal = CMPI_RC_ERR_ACCESS_DENIED;
+    const Host::ObjectPath& source = sensor("B:/2");
+    const auto expected = [](const std::string& name) {
+        return sequence({request(name).entry(), request(name).failure(UpcallFailed)});
+    };
+    EXPECT_EQ(ownLines(traceOf([&] { associators(source); })), expected("Associators"));
+    EXPECT_EQ(ownLines(traceOf([&] { associatorNames(source); })), expected("AssociatorNames"));
+    EXPECT_EQ(ownLines(traceOf([&] { references(source); })), expected("References"));
+    EXPECT_EQ(ownLines(traceOf([&] { referenceNames(source); })), expected("ReferenceNames"));
+}
+
+} // namespace
