@@ -17,6 +17,14 @@ namespace {
 
 constexpr std::size_t MaximumIncludeDepth = 16;
 constexpr std::size_t MaximumIncludes = 4096;
+constexpr std::size_t MaximumNamespaces = 256;
+
+// What would break the line of a message that shows the name.
+bool hasControlCharacter(std::string_view name)
+{
+    return std::any_of(name.begin(), name.end(),
+        [](char c) { return static_cast<unsigned char>(c) < 0x20 || c == 0x7F; });
+}
 
 // One file is one file, by whatever path it is reached.
 std::filesystem::path identityOf(const std::filesystem::path& file)
@@ -86,10 +94,15 @@ private:
             throw MofError(
                 pragma.argumentPosition, quotation(pragma.argument) + " is no name of a namespace");
         nameSpace_ = &compiler_.openNamespace(name);
+        if (compiler_.namespaces_.size() > MaximumNamespaces)
+            throw MofError(pragma.argumentPosition, "too many namespaces");
     }
 
     void include(const Syntax::Pragma& pragma)
     {
+        if (hasControlCharacter(pragma.argument))
+            throw MofError(
+                pragma.argumentPosition, quotation(pragma.argument) + " is no name of a file");
         const std::filesystem::path included = file_.parent_path() / pragma.argument;
         const auto fail = [&](const std::string& reason) {
             throw MofError(pragma.argumentPosition, included.string() + ": " + reason);

@@ -59,7 +59,9 @@ Constant valueOf(const Syntax::Qualifier& written, const QualifierDeclaration& d
 {
     if (written.value)
         return toConstant(*written.value, declaration.type);
-    return declaration.type == CMPI_boolean ? Scalar(true) : Scalar();
+    if (declaration.type != CMPI_boolean)
+        return {};
+    return Constant(std::in_place_type<Scalar>, true);
 }
 
 const Qualifier* sameQualifier(const QualifierList& list, const Qualifier& wanted)

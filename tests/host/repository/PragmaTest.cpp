@@ -164,6 +164,20 @@ TEST_F(PragmaTest, namespacesHaveNames)
     EXPECT_THROW(compiler.compileText("", "test.mof", "a b"), std::invalid_argument);
 }
 
+TEST_F(PragmaTest, namespacesAreNotWithoutNumber)
+{
+    std::string text;
+    for (int i = 1; i <= 256; ++i)
+        text += "#pragma namespace (\"root/" + std::to_string(i) + "\")\n";
+    EXPECT_EQ(Testing::errorOf(text), "test.mof:256:20: too many namespaces");
+}
+
+TEST_F(PragmaTest, namesOfFilesFitIntoOneLine)
+{
+    EXPECT_EQ(Testing::errorOf("#pragma include (\"a\\nb\")"),
+        "test.mof:1:18: \"a\\x0ab\" is no name of a file");
+}
+
 TEST_F(PragmaTest, otherPragmasHaveNoEffect)
 {
     EXPECT_EQ(Testing::errorOf("#pragma locale (\"en_US\")\n# pragma whatever (\"x\" \"y\")"),
