@@ -1,0 +1,140 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// Every path that one request is answered with can be asked for in the next one.
+
+#include "tests/providers/AssociationTest.h"
+
+#include <gmock/gmock.h>
+
+namespace {
+
+using namespace Testing;
+
+// The association and the class at its other end.
+struct Journey {
+    const char* name;
+    const char* association;
+    CMPIInstanceMI* (*instances)(const CMPIBroker*, const CMPIContext*, CMPIStatus*);
+    CMPIAssociationMI* (*associations)(const CMPIBroker*, const CMPIContext*, CMPIStatus*);
+    const char* otherClass;
+};
+
+const Journey Journeys[] = {
+    {"elementCapabilities", "ZUMLO_SensorElementCapabilities",
+        SensorElementCapabilitiesProvider_Create_InstanceMI,
+        SensorElementCapabilitiesProvider_Create_AssociationMI, CapabilitiesClass},
+    {"systemDevice", "ZUMLO_SensorSystemDevice", SensorSystemDeviceProvider_Create_InstanceMI,
+        SensorSystemDeviceProvider_Create_AssociationMI, SystemClass},
+};
+
+class AssociationRoundTripTest : public AssociationTest,
+                                 public ::testing::WithParamInterface<Journey> {
+protected:
+    AssociationRoundTripTest()
+        : AssociationTest(
+              GetParam().instances, GetParam().associations, ThreeSensors, {"host", "guest"})
+    {
+    }
+
+    Host::ObjectPath& otherEnd()
+    {
+        return std::string(GetParam().otherClass) == SystemClass ? system("guest") : capabilities();
+    }
+
+    // The objects at the paths that were delivered, each as its class's provider tells it.
+    std::vector<const Host::ObjectPath*> takeDelivered()
+    {
+        std::vector<const Host::ObjectPath*> taken = answer_.paths();
+        for (const Host::Instance* const instance : answer_.instances())
+            taken.push_back(&instance->objectPath());
+        answer_ = Host::CollectedResult();
+        return taken;
+    }
+
+    void expectFetched(const Host::ObjectPath& path)
+    {
+        if (path.className() == SystemClass) {
+            EXPECT_EQ(
+                systems_.getInstance(request_->context(), path, nullptr).objectPath().toText(),
+                path.toText());
+            return;
+        }
+        CMPIInstanceMI* const mi = providerOf(path.className());
+        Host::CollectedResult found;
+        Host::Result into(found);
+        expectOk(mi->ft->getInstance(mi, context(), into.handle(), path.handle(), nullptr));
+        ASSERT_EQ(found.instances().size(), 1U) << path.toText();
+        EXPECT_EQ(found.instances()[0]->objectPath().toText(), path.toText());
+    }
+
+    void expectAllFetched(std::size_t count)
+    {
+        const auto paths = takeDelivered();
+        EXPECT_EQ(paths.size(), count);
+        for (const Host::ObjectPath* const path : paths)
+            expectFetched(*path);
+    }
+
+private:
+    CMPIInstanceMI* providerOf(std::string_view className)
+    {
+        if (className == SensorClass)
+            return SensorProfileProvider_Create_InstanceMI(broker(), nullptr, nullptr);
+        if (className == CapabilitiesClass)
+            return SensorEnabledLogicalElementCapabilitiesProvider_Create_InstanceMI(
+                broker(), nullptr, nullptr);
+        EXPECT_EQ(className, GetParam().association);
+        return instanceMI_;
+    }
+};
+
+INSTANTIATE_TEST_SUITE_P(Each, AssociationRoundTripTest, ::testing::ValuesIn(Journeys),
+    [](const ::testing::TestParamInfo<Journey>& journey) { return journey.param.name; });
+
+TEST_P(AssociationRoundTripTest, fromNamesAndInstancesToInstances)
+{
+    const std::size_t pairs = GetParam().otherClass == std::string(SystemClass) ? 6 : 3;
+    expectOk(enumerateNames(path(GetParam().association)));
+    expectAllFetched(pairs);
+    Host::CollectedResult found;
+    Host::Result into(found);
+    expectOk(instanceMI_->ft->enumerateInstances(
+        instanceMI_, context(), into.handle(), path(GetParam().association).handle(), nullptr));
+    EXPECT_EQ(found.instances().size(), pairs);
+    for (const Host::Instance* const instance : found.instances())
+        expectFetched(instance->objectPath());
+}
+
+TEST_P(AssociationRoundTripTest, fromReferencesOfEitherEndToInstances)
+{
+    const std::size_t others = GetParam().otherClass == std::string(SystemClass) ? 2 : 1;
+    expectOk(references(otherEnd()));
+    expectAllFetched(3);
+    expectOk(references(sensor("B:/2")));
+    expectAllFetched(others);
+    expectOk(referenceNames(otherEnd()));
+    expectAllFetched(3);
+    expectOk(referenceNames(sensor("B:/2")));
+    expectAllFetched(others);
+}
+
+TEST_P(AssociationRoundTripTest, fromAssociatorsOfEitherEndToInstancesAndBack)
+{
+    const std::size_t others = GetParam().otherClass == std::string(SystemClass) ? 2 : 1;
+    expectOk(associatorNames(otherEnd()));
+    expectAllFetched(3);
+    expectOk(associators(otherEnd()));
+    expectAllFetched(3);
+    expectOk(associatorNames(sensor("B:/2")));
+    const auto farEnds = takeDelivered();
+    ASSERT_EQ(farEnds.size(), others);
+    for (const Host::ObjectPath* const farEnd : farEnds) {
+        expectFetched(*farEnd);
+        expectOk(associatorNames(*farEnd)); // and back to the sensors
+        const auto sensors = takeDelivered();
+        ASSERT_EQ(sensors.size(), 3U);
+        EXPECT_EQ(sensors[1]->toText(), sensor("B:/2").toText());
+    }
+}
+
+} // namespace

@@ -1,0 +1,150 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// What becomes of any request of ZUMLO_SensorSystemDevice when the broker fails it, and of those
+// for associated objects in detail.
+
+#include "tests/providers/SystemDeviceFaultTest.h"
+
+#include <gmock/gmock.h>
+
+namespace {
+
+using namespace Testing;
+using namespace Testing::SystemDevice;
+
+// ---- Every call, every way ----
+
+class SystemDeviceFaultSweep : public SystemDeviceFaultTest,
+                               public ::testing::WithParamInterface<RequestKind> {};
+
+INSTANTIATE_TEST_SUITE_P(Instances, SystemDeviceFaultSweep,
+    ::testing::Values(Names, Instances, OneInstance, Kinds.one("instanceWithoutKeys", Keyless)),
+    ::testing::PrintToStringParamName());
+INSTANTIATE_TEST_SUITE_P(FromSensor, SystemDeviceFaultSweep, ::testing::ValuesIn(FromSensor),
+    ::testing::PrintToStringParamName());
+INSTANTIATE_TEST_SUITE_P(FromSystem, SystemDeviceFaultSweep, ::testing::ValuesIn(FromSystem),
+    ::testing::PrintToStringParamName());
+
+TEST_P(SystemDeviceFaultSweep, isSurvivedAndAnswersWithNothingMadeUp)
+{
+    sweepFaults(broker_, [&](FaultyBroker& faulty) {
+        const FaultyRequest request(broker_, faulty, GetParam());
+        EXPECT_LE(request.answer.paths().size() + request.answer.instances().size(), 4U);
+        expectWellFormed(request, Class,
+            {{"GroupComponent", SystemClass}, {"PartComponent", "ZUMLO_NumericSensor"}});
+    });
+}
+
+class SystemDeviceAssociationFaultTest : public SystemDeviceFaultTest {};
+
+// ---- Associated objects. The first path that is made is the target, the second one of references
+// ---- is the association's. ----
+
+TEST_F(SystemDeviceAssociationFaultTest, aTargetThatCannotBeMadeIsNoTarget)
+{
+    for (const FaultManner manner : Undelivered)
+        for (const auto* const kinds : {FromSensor, FromSystem})
+            for (const Which which : {Associators, AssociatorNames, References, ReferenceNames}) {
+                const auto request = run(kinds[which], {BrokerCall::newObjectPath, 1, manner});
+                EXPECT_EQ(countOf(*request), 0U);
+                EXPECT_FALSE(request->answer.isDone());
+                if (which == Associators || which == AssociatorNames) {
+                    EXPECT_EQ(request->status.rc, CMPI_RC_OK);
+                    EXPECT_EQ(request->status.msg, nullptr);
+                    continue;
+                }
+                const std::string text = "Object Path is NULL in " + Requests[which] + ".";
+                EXPECT_EQ(request->status.rc, CMPI_RC_ERR_FAILED);
+                EXPECT_EQ(request->message(), text);
+                EXPECT_EQ(request->lastMessage(), (BrokerMessage{2, Provider, text}));
+            }
+}
+
+TEST_F(SystemDeviceAssociationFaultTest, sensorPathsThatCannotBeMadeEndInTheFactorysStatus)
+{
+    for (const Which which : {AssociatorNames, References, ReferenceNames}) {
+        const unsigned nth = which == AssociatorNames ? 2 : 3;
+        std::unique_ptr<FaultyRequest> request;
+        const Fault fault = {BrokerCall::newObjectPath, nth, FaultManner::nullResult};
+        const Lines lines = ownLines(traceOf([&] { request = run(FromSystem[which], fault); }));
+        EXPECT_EQ(request->status.rc, CMPI_RC_ERR_FAILED);
+        EXPECT_EQ(request->message(), "Create CMPIObjectPath failed.");
+        EXPECT_EQ(countOf(*request), 0U);
+        const HandlerLines expected = handler(Requests[which]);
+        EXPECT_EQ(
+            lines, sequence({expected.entry(), expected.failure("getAllSensorCMPIObjPaths failed"),
+                       expected.exit()}));
+    }
+}
+
+TEST_F(SystemDeviceAssociationFaultTest, withoutAnAssociationPathThereAreNoReferences)
+{
+    for (const auto* const kinds : {FromSensor, FromSystem})
+        for (const Which which : {References, ReferenceNames}) {
+            const auto request =
+                run(kinds[which], {BrokerCall::newObjectPath, 2, FaultManner::nullResult});
+            EXPECT_EQ(request->status.rc, CMPI_RC_ERR_FAILED); // as the broker left it
+            EXPECT_EQ(countOf(*request), 0U);
+        }
+}
+
+TEST_F(SystemDeviceAssociationFaultTest, anAbsentEnumerationHasNoFarEnds)
+{
+    for (const FaultManner manner : Undelivered)
+        for (const Which which : {Associators, AssociatorNames, References, ReferenceNames}) {
+            const BrokerCall call = which == Associators ? BrokerCall::enumerateInstances
+                                                         : BrokerCall::enumerateInstanceNames;
+            const auto request = run(FromSensor[which], {call, 1, manner, CMPI_RC_OK});
+            EXPECT_EQ(request->status.rc, CMPI_RC_OK);
+            EXPECT_EQ(countOf(*request), 0U);
+        }
+}
+
+TEST_F(SystemDeviceAssociationFaultTest, associatorsBeforeABreakAreDeliveredWithItsStatus)
+{
+    for (const Which which : {Associators, AssociatorNames})
+        for (const BrokerCall call : {BrokerCall::hasNext, BrokerCall::getNext}) {
+            const auto request = run(FromSensor[which], {call, 2, FaultManner::errorStatus});
+            EXPECT_EQ(request->status.rc, CMPI_RC_ERR_FAILED);
+            EXPECT_EQ(countOf(*request), 1U);
+        }
+}
+
+TEST_F(SystemDeviceAssociationFaultTest, aBreakBetweenFarEndsLeavesNoReferences)
+{
+    for (const Which which : {References, ReferenceNames})
+        for (const BrokerCall call : {BrokerCall::hasNext, BrokerCall::getNext}) {
+            std::unique_ptr<FaultyRequest> request;
+            const Fault fault = {call, 2, FaultManner::errorStatus};
+            const Lines lines = ownLines(traceOf([&] { request = run(FromSensor[which], fault); }));
+            EXPECT_EQ(request->status.rc, CMPI_RC_ERR_FAILED);
+            EXPECT_EQ(countOf(*request), 0U);
+            const HandlerLines expected = handler(Requests[which]);
+            EXPECT_EQ(
+                lines, sequence({expected.entry(),
+                           expected.failure("Call to CBEnumInstances of target Class Failed.")}));
+        }
+}
+
+TEST_F(SystemDeviceAssociationFaultTest, anElementWithoutHandleIsLeftOut)
+{
+    for (const Which which : {Associators, AssociatorNames, References, ReferenceNames}) {
+        const auto request =
+            run(FromSensor[which], {BrokerCall::getNext, 1, FaultManner::handleless, CMPI_RC_OK});
+        EXPECT_EQ(request->status.rc, CMPI_RC_OK);
+        EXPECT_EQ(countOf(*request), 1U);
+    }
+}
+
+TEST_F(SystemDeviceAssociationFaultTest, aReferenceThatCannotBeMadeIsLeftOut)
+{
+    for (const FaultManner manner : Undelivered)
+        for (const auto* const kinds : {FromSensor, FromSystem})
+            for (const Which which : {References, ReferenceNames}) {
+                const auto request = run(kinds[which], {BrokerCall::newInstance, 1, manner});
+                EXPECT_EQ(request->status.rc, CMPI_RC_OK);
+                EXPECT_EQ(countOf(*request), 1U);
+            }
+}
+
+} // namespace

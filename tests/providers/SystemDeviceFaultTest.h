@@ -1,0 +1,57 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// The requests of ZUMLO_SensorSystemDevice for a broker that fails them.
+
+#pragma once
+
+#include "tests/providers/Factories.h"
+#include "tests/providers/FaultyAssociation.h"
+#include "tests/providers/RequestTrace.h"
+
+#include <string>
+
+namespace Testing::SystemDevice {
+
+inline constexpr const char* Class = "ZUMLO_SensorSystemDevice";
+inline constexpr const char* SystemClass = "ZUMLO_ComputerSystem";
+inline constexpr const char* Provider = "SensorSystemDeviceProvider";
+
+inline const AssociationKinds Kinds = {
+    SensorSystemDeviceProvider_Create_InstanceMI, SensorSystemDeviceProvider_Create_AssociationMI};
+inline const SourceMaker Keyless = pathMaker(Class);
+inline const SourceMaker Sensor = sensorMaker("B:/2");
+inline const SourceMaker System = [](const Host::Request&) -> Host::ObjectPath& {
+    return ComputerSystems({}).pathTo("host");
+};
+
+inline const RequestKind Names = Kinds.names(Keyless);
+inline const RequestKind Instances = Kinds.instances(Keyless);
+inline const RequestKind OneInstance =
+    Kinds.one("oneInstance", pairMaker(Class, "GroupComponent", System, "PartComponent", Sensor));
+inline const RequestKind FromSensor[] = {Kinds.associators("Sensor", Sensor),
+    Kinds.associatorNames("Sensor", Sensor), Kinds.references("Sensor", Sensor),
+    Kinds.referenceNames("Sensor", Sensor)};
+inline const RequestKind FromSystem[] = {Kinds.associators("System", System),
+    Kinds.associatorNames("System", System), Kinds.references("System", System),
+    Kinds.referenceNames("System", System)};
+enum Which { Associators, AssociatorNames, References, ReferenceNames };
+inline const std::string Requests[] = {
+    "Associators", "AssociatorNames", "References", "ReferenceNames"};
+
+class SystemDeviceFaultTest : public AssociationFaultTest {
+protected:
+    SystemDeviceFaultTest() : AssociationFaultTest({"host", "guest"}) {}
+
+    static HandlerLines handler(const std::string& request)
+    {
+        return {"SenosrSystemDeviceProvider", Provider, "SensorSystemDevice_" + request};
+    }
+
+    static std::size_t countOf(const FaultyRequest& request)
+    {
+        EXPECT_EQ(request.answer.refused(), 0U);
+        return request.answer.paths().size() + request.answer.instances().size();
+    }
+};
+
+} // namespace Testing::SystemDevice

@@ -1,0 +1,208 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// What becomes of the instances of ZUMLO_SensorSystemDevice when the broker fails a request.
+
+#include "tests/providers/SystemDeviceFaultTest.h"
+
+#include <gmock/gmock.h>
+
+namespace {
+
+using namespace Testing;
+using namespace Testing::SystemDevice;
+using ::testing::ElementsAre;
+using ::testing::ElementsAreArray;
+using ::testing::IsEmpty;
+
+const std::string Gap(21, ' ');
+
+class SystemDeviceInstanceFaultTest : public SystemDeviceFaultTest {
+protected:
+    // That the builder reports a failure so, within a request that answers as if nothing had
+    // been there.
+    void expectBuilderFailure(const Fault& fault, const std::string& statusText,
+        const std::string& traceText, bool hasExitMark)
+    {
+        for (const RequestKind& kind : {Instances, OneInstance}) {
+            std::unique_ptr<FaultyRequest> request;
+            const Lines lines = ownLines(traceOf([&] { request = run(kind, fault); }));
+            EXPECT_EQ(request->status.rc, CMPI_RC_OK);
+            EXPECT_EQ(request->status.msg, nullptr);
+            EXPECT_EQ(countOf(*request), 0U);
+            EXPECT_TRUE(request->answer.isDone());
+            EXPECT_EQ(request->lastString(), statusText);
+            EXPECT_EQ(request->lastMessage(), (BrokerMessage{2, Provider, traceText}));
+            const HandlerLines builder = {
+                "SenosrSystemDeviceProvider", Provider, "sensorSystemDeviceCMPIInstances"};
+            const HandlerLines outer =
+                handler(kind.name == "instances" ? "EnumInstances" : "GetInstance");
+            EXPECT_THAT(lines, ElementsAreArray(sequence({outer.entry(), builder.entry(),
+                                   hasExitMark ? builder.exit() : Lines(), outer.exit()})));
+        }
+    }
+
+    // That the enumeration of names ends with a status of its own, in an open result.
+    std::unique_ptr<FaultyRequest> expectNamesFailure(const Fault& fault,
+        const std::string& statusText, const std::string& traceText, bool hasExitMark)
+    {
+        std::unique_ptr<FaultyRequest> request;
+        const Lines lines = ownLines(traceOf([&] { request = run(Names, fault); }));
+        EXPECT_EQ(request->status.rc, CMPI_RC_ERR_FAILED);
+        EXPECT_EQ(request->message(), statusText);
+        EXPECT_FALSE(request->answer.isDone());
+        EXPECT_THAT(request->messages, ElementsAre(BrokerMessage{2, Provider, traceText}));
+        const HandlerLines names = handler("EnumInstanceNames");
+        EXPECT_THAT(lines,
+            ElementsAreArray(sequence({names.entry(), hasExitMark ? names.exit() : Lines()})));
+        return request;
+    }
+};
+
+// ---- The walk over all pairs. Paths are made in this order: the class of systems, then for each
+// ---- system both sensors and their associations. ----
+
+constexpr unsigned SystemPath = 1;
+constexpr unsigned FirstSensor = 2;
+constexpr unsigned FirstAssociation = 4;
+constexpr unsigned LastAssociation = 9;
+constexpr unsigned LastKeyOfFirstSensor = 4;
+
+TEST_F(SystemDeviceInstanceFaultTest, namesEndAtASystemPathThatCannotBeMade)
+{
+    for (const FaultManner manner : Undelivered)
+        for (const BrokerCall call : {BrokerCall::newObjectPath, BrokerCall::getNameSpace})
+            expectNamesFailure({call, SystemPath, manner}, "Create CMPIObjectPath failed.",
+                "Create CMPIObjectPath failed for ComputerSystemClass.", true);
+    EXPECT_THAT(systems_.calls, IsEmpty());
+}
+
+TEST_F(SystemDeviceInstanceFaultTest, namesEndAtASensorPathThatIsGone)
+{
+    expectNamesFailure({BrokerCall::addKey, LastKeyOfFirstSensor, FaultManner::lostHandle},
+        "CMPIObjectPath is NULL for Sensor", "CMPIObjectPath is NULL for Sensor Class", false);
+}
+
+TEST_F(SystemDeviceInstanceFaultTest, namesEndAtAnAssociationPathThatCannotBeMade)
+{
+    for (const FaultManner manner : Undelivered)
+        for (const unsigned nth : {FirstAssociation, LastAssociation}) {
+            const auto request = expectNamesFailure({BrokerCall::newObjectPath, nth, manner},
+                "Create CMPIObjectPath failed" + Gap + "for SensorSystemDeviceProvider.",
+                "Create CMPIObjectPath failed for" + Gap + "SensorSystemDeviceClass.", false);
+            EXPECT_EQ(request->answer.paths().size(), nth == FirstAssociation ? 0U : 3U);
+        }
+}
+
+TEST_F(SystemDeviceInstanceFaultTest, namesWithoutSensorPathsEndInTheFactorysStatus)
+{
+    for (const FaultManner manner : Undelivered) {
+        std::unique_ptr<FaultyRequest> request;
+        const Lines lines = ownLines(traceOf([&] {
+            request = run(Names, {BrokerCall::newObjectPath, FirstSensor, manner});
+        }));
+        EXPECT_EQ(request->status.rc, CMPI_RC_ERR_FAILED);
+        EXPECT_EQ(request->message(), "Create CMPIObjectPath failed.");
+        EXPECT_EQ(request->messages.size(), 1U); // the factory's
+        EXPECT_FALSE(request->answer.isDone());
+        EXPECT_EQ(lines, handler("EnumInstanceNames").entry());
+    }
+}
+
+TEST_F(SystemDeviceInstanceFaultTest, namesAnswerAFailedUpcallWithOkAndAMessage)
+{
+    for (const FaultManner manner :
+        {FaultManner::nullResult, FaultManner::handleless, FaultManner::errorStatus}) {
+        const auto request = run(Names, {BrokerCall::enumerateInstanceNames, 1, manner});
+        EXPECT_EQ(request->status.rc, CMPI_RC_OK);
+        EXPECT_EQ(request->message(), "CBEnumInstanceNames Failed for the ZUMLO_ComputerSystem");
+        EXPECT_EQ(countOf(*request), 0U);
+        EXPECT_FALSE(request->answer.isDone());
+        EXPECT_THAT(request->messages, IsEmpty());
+    }
+}
+
+TEST_F(SystemDeviceInstanceFaultTest, anAbsentEnumerationHasNoSystems)
+{
+    for (const FaultManner manner : Undelivered)
+        for (const RequestKind& kind : {Names, Instances, OneInstance}) {
+            const auto request =
+                run(kind, {BrokerCall::enumerateInstanceNames, 1, manner, CMPI_RC_OK});
+            EXPECT_EQ(request->status.rc, CMPI_RC_OK);
+            EXPECT_EQ(request->status.msg, nullptr);
+            EXPECT_EQ(countOf(*request), 0U);
+            EXPECT_TRUE(request->answer.isDone());
+        }
+}
+
+TEST_F(SystemDeviceInstanceFaultTest, namesEndWhereTheEnumerationBreaks)
+{
+    for (const BrokerCall call : {BrokerCall::hasNext, BrokerCall::getNext})
+        for (const FaultManner manner : {FaultManner::nullResult, FaultManner::errorStatus}) {
+            std::unique_ptr<FaultyRequest> request;
+            const Fault fault = {call, 2, manner, CMPI_RC_ERR_FAILED};
+            const Lines lines = ownLines(traceOf([&] { request = run(Names, fault); }));
+            EXPECT_EQ(request->status.rc, CMPI_RC_ERR_FAILED); // as the broker left it
+            EXPECT_EQ(countOf(*request), 2U);                  // of the first system
+            EXPECT_FALSE(request->answer.isDone());
+            EXPECT_EQ(lines, handler("EnumInstanceNames").entry());
+        }
+}
+
+TEST_F(SystemDeviceInstanceFaultTest, theBuilderReportsASystemPathThatCannotBeMade)
+{
+    for (const FaultManner manner : Undelivered)
+        expectBuilderFailure({BrokerCall::newObjectPath, SystemPath, manner},
+            "Create CMPIObjectPath" + std::string(12, ' ') + "failed.",
+            "Create CMPIObjectPath failed for" + std::string(13, ' ') + "ComputerSystemClass.",
+            true);
+}
+
+TEST_F(SystemDeviceInstanceFaultTest, theBuilderReportsASensorPathThatIsGone)
+{
+    const std::string text = "CMPIObjectPath is NULL for Sensor Provider";
+    expectBuilderFailure(
+        {BrokerCall::addKey, LastKeyOfFirstSensor, FaultManner::lostHandle}, text, text, false);
+}
+
+TEST_F(SystemDeviceInstanceFaultTest, theBuilderReportsAnAssociationPathThatCannotBeMade)
+{
+    for (const FaultManner manner : Undelivered)
+        for (const unsigned nth : {FirstAssociation, LastAssociation})
+            expectBuilderFailure({BrokerCall::newObjectPath, nth, manner},
+                "Create CMPIObjectPath failed for HostedAccessPoint",
+                "Create CMPIObjectPath failed for" + Gap + "HostedAccessPoint.", false);
+}
+
+TEST_F(SystemDeviceInstanceFaultTest, theBuilderEndsSilentlyAtAnUpcallAnElementOrSensorsThatFail)
+{
+    for (const Fault& fault :
+        {Fault{BrokerCall::enumerateInstanceNames, 1, FaultManner::nullResult},
+            Fault{BrokerCall::hasNext, 2, FaultManner::errorStatus},
+            Fault{BrokerCall::getNext, 2, FaultManner::errorStatus},
+            Fault{BrokerCall::newObjectPath, FirstSensor, FaultManner::nullResult}}) {
+        std::unique_ptr<FaultyRequest> request;
+        const Lines lines = ownLines(traceOf([&] { request = run(Instances, fault); }));
+        EXPECT_EQ(request->status.rc, CMPI_RC_OK);
+        EXPECT_EQ(countOf(*request), 0U);
+        EXPECT_TRUE(request->answer.isDone());
+        const HandlerLines builder = {
+            "SenosrSystemDeviceProvider", Provider, "sensorSystemDeviceCMPIInstances"};
+        const HandlerLines outer = handler("EnumInstances");
+        EXPECT_EQ(lines, sequence({outer.entry(), builder.entry(), outer.exit()}));
+    }
+}
+
+TEST_F(SystemDeviceInstanceFaultTest, anInstanceThatCannotBeMadeIsPassedOnButPassedOverInASearch)
+{
+    for (const FaultManner manner : Undelivered) {
+        const auto all = run(Instances, {BrokerCall::newInstance, 1, manner});
+        EXPECT_EQ(all->status.rc, CMPI_RC_OK);
+        EXPECT_EQ(all->answer.refused(), 1U);
+        EXPECT_EQ(all->answer.instances().size(), 3U);
+        const auto one = run(OneInstance, {BrokerCall::newInstance, 1, manner});
+        EXPECT_EQ(one->status.rc, CMPI_RC_OK);
+        EXPECT_EQ(countOf(*one), 1U); // the pair is the second one
+    }
+}
+
+} // namespace
