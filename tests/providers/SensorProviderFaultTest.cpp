@@ -3,8 +3,7 @@
 // What becomes of a request of ZUMLO_NumericSensor when the broker fails it.
 
 #include "tests/providers/Factories.h"
-#include "tests/support/FaultSweep.h"
-#include "tests/support/ProviderTest.h"
+#include "tests/providers/FaultyRequest.h"
 
 #include <gmock/gmock.h>
 
@@ -15,10 +14,12 @@ using Testing::BrokerMessage;
 using Testing::describe;
 using ::testing::ElementsAre;
 using Testing::FaultManner;
+using Testing::FaultTest;
 using Testing::FaultyBroker;
+using Testing::FaultyRequest;
 using Testing::LogCapture;
 using Testing::property;
-using Testing::ProviderTest;
+using Testing::RequestKind;
 using Testing::ScriptedMachine;
 using Testing::ScriptedNode;
 using Vorn::NodeReading;
@@ -30,68 +31,39 @@ const std::vector<ScriptedNode> TwoSensors = {{NodeType::Temperature, "/t", "CPU
 
 enum class Operation { names, instances, oneInstance, instanceByPath, instanceWithoutKeys };
 
-// One request with a broker of its own choosing, and all that came of it.
-class FaultyRequest {
-public:
-    FaultyRequest(Host::Broker& broker, FaultyBroker& faulty, Operation operation,
-        const char** properties = nullptr)
-        : request_(broker)
-    {
-        broker.setTraceObserver([this](const Host::TraceMessage& message) {
-            messages.push_back({static_cast<unsigned>(message.level),
-                std::string(message.component), std::string(message.text)});
-        });
-        CMPIInstanceMI* const mi =
-            SensorProfileProvider_Create_InstanceMI(faulty.handle(), nullptr, nullptr);
-        const CMPIContext* const context = request_.context().handle();
-        const CMPIResult* const result = faulty.watch(result_.handle());
-        const CMPIObjectPath* const ref = faulty.watch(path(operation).handle());
-        if (operation == Operation::names)
-            status = mi->ft->enumerateInstanceNames(mi, context, result, ref);
-        else if (operation == Operation::instances)
-            status = mi->ft->enumerateInstances(mi, context, result, ref, properties);
-        else
-            status = mi->ft->getInstance(mi, context, result, ref, properties);
-        broker.setTraceObserver({});
-    }
-
-    std::string message() const { return Testing::textOf(status.msg); }
-
-    Host::CollectedResult answer;
-    std::vector<BrokerMessage> messages;
-    CMPIStatus status = {};
-
-private:
-    Host::ObjectPath& path(Operation operation)
-    {
-        Host::ObjectPath& made = request_.makePath("root/cimv2", Class);
+// A request of the operation.
+RequestKind kindOf(Operation operation, const char** properties = nullptr)
+{
+    const auto source = [operation](const Host::Request& request) -> Host::ObjectPath& {
+        Host::ObjectPath& made = request.makePath("root/cimv2", Class);
         if (operation == Operation::oneInstance)
-            made.addKey("DeviceID", Host::Value::text(request_.arena(), "Fan:/f"));
+            made.addKey("DeviceID", Host::Value::text(request.arena(), "Fan:/f"));
         if (operation == Operation::instanceByPath)
-            made.addKey("Other", Host::Value::text(request_.arena(), "x"));
+            made.addKey("Other", Host::Value::text(request.arena(), "x"));
         return made;
-    }
+    };
+    const auto run = [=](const CMPIBroker* broker, const CMPIContext* context,
+                         const CMPIResult* result, const CMPIObjectPath* ref) {
+        CMPIInstanceMI* const mi =
+            SensorProfileProvider_Create_InstanceMI(broker, nullptr, nullptr);
+        if (operation == Operation::names)
+            return mi->ft->enumerateInstanceNames(mi, context, result, ref);
+        if (operation == Operation::instances)
+            return mi->ft->enumerateInstances(mi, context, result, ref, properties);
+        return mi->ft->getInstance(mi, context, result, ref, properties);
+    };
+    return {"", source, run};
+}
 
-    Host::Request request_;
-    Host::Result result_{answer};
-};
-
-class SensorProviderFaultTest : public ::testing::Test {
+class SensorProviderFaultTest : public FaultTest {
 protected:
     // Runs the request with one fault.
     std::unique_ptr<FaultyRequest> run(
         Operation operation, const Testing::Fault& fault, const char** properties = nullptr)
     {
-        faulty_.reset(); // the last one made is the one in force, so they end in turn
-        faulty_ = std::make_unique<FaultyBroker>(broker_);
-        faulty_->plan(fault);
-        auto request = std::make_unique<FaultyRequest>(broker_, *faulty_, operation, properties);
-        EXPECT_EQ(faulty_->fired(), 1U) << "the request does not get as far as the fault";
-        return request;
+        return FaultTest::run(kindOf(operation, properties), fault);
     }
 
-    Host::Broker broker_;
-    std::unique_ptr<FaultyBroker> faulty_;
     ScriptedMachine machine_{TwoSensors};
 };
 
@@ -107,7 +79,7 @@ INSTANTIATE_TEST_SUITE_P(EveryRequest, SensorProviderFaultSweep,
 TEST_P(SensorProviderFaultSweep, isSurvivedAndAnswersWithNothingMadeUp)
 {
     Testing::sweepFaults(broker_, [&](FaultyBroker& faulty) {
-        const FaultyRequest request(broker_, faulty, GetParam());
+        const FaultyRequest request(broker_, faulty, kindOf(GetParam()));
         EXPECT_TRUE(request.status.rc == CMPI_RC_OK || request.status.rc == CMPI_RC_ERR_FAILED)
             << request.status.rc;
         EXPECT_LE(request.answer.paths().size(), 2U);
