@@ -1,0 +1,72 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// Counts have 16 bits: of more sensors than that, an association tells as many as the count says.
+
+#include "tests/providers/AssociationTest.h"
+
+#include <gmock/gmock.h>
+
+namespace {
+
+using namespace Testing;
+using ::testing::ElementsAre;
+
+constexpr const char* ElementCapabilities = "ZUMLO_SensorElementCapabilities";
+constexpr const char* SystemDevice = "ZUMLO_SensorSystemDevice";
+
+// Ordered as they are numbered.
+std::vector<ScriptedNode> sensors(std::size_t count)
+{
+    std::vector<ScriptedNode> nodes;
+    for (std::size_t i = 0; i < count; ++i)
+        nodes.push_back({Vorn::NodeLexicon::NodeType::Tachometer, "/" + std::to_string(100000 + i),
+            "F", Vorn::NodeReading{}});
+    return nodes;
+}
+
+template <std::size_t count>
+class ElementCapabilitiesOfMany : public AssociationTest {
+protected:
+    ElementCapabilitiesOfMany()
+        : AssociationTest(SensorElementCapabilitiesProvider_Create_InstanceMI,
+              SensorElementCapabilitiesProvider_Create_AssociationMI, sensors(count), {})
+    {
+    }
+};
+using ElementCapabilitiesOf65536SensorsTest = ElementCapabilitiesOfMany<65536>;
+using ElementCapabilitiesOf65537SensorsTest = ElementCapabilitiesOfMany<65537>;
+
+class SystemDeviceOf65537SensorsTest : public AssociationTest {
+protected:
+    SystemDeviceOf65537SensorsTest()
+        : AssociationTest(SensorSystemDeviceProvider_Create_InstanceMI,
+              SensorSystemDeviceProvider_Create_AssociationMI, sensors(65537), {"host", "guest"})
+    {
+    }
+};
+
+TEST_F(ElementCapabilitiesOf65536SensorsTest, thereAreNoPairs)
+{
+    expectOk(enumerateNames(path(ElementCapabilities)));
+    expectNothing(true);
+}
+
+TEST_F(ElementCapabilitiesOf65537SensorsTest, thereIsOnePairAndOneFarEnd)
+{
+    expectOk(associatorNames(capabilities()));
+    EXPECT_THAT(delivered(), ElementsAre("F:/100000"));
+    expectOk(referenceNames(capabilities()));
+    EXPECT_EQ(answer_.paths().size(), 2U);
+    expectOk(enumerate(path(ElementCapabilities)));
+    EXPECT_EQ(answer_.instances().size(), 1U);
+}
+
+TEST_F(SystemDeviceOf65537SensorsTest, thereIsOnePairForEachSystem)
+{
+    expectOk(associatorNames(system("host")));
+    EXPECT_THAT(delivered(), ElementsAre("F:/100000"));
+    expectOk(enumerate(path(SystemDevice)));
+    EXPECT_EQ(answer_.instances().size(), 2U);
+}
+
+} // namespace
