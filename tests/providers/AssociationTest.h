@@ -29,6 +29,34 @@ struct Filter {
     const char** properties = nullptr;
 };
 
+// The broker, with functions of the test's own behind the instances it makes. One at a time.
+class BrokerWithInstances {
+public:
+    BrokerWithInstances(const CMPIBroker* broker, const CMPIInstanceFT& functions)
+        : functions_(*broker->eft), broker_(*broker)
+    {
+        real_ = broker->eft;
+        instanceFunctions_ = functions;
+        functions_.newInstance = [](const CMPIBroker* handle, const CMPIObjectPath* path,
+                                     CMPIStatus* rc) {
+            CMPIInstance* const made = real_->newInstance(handle, path, rc);
+            made->ft = &instanceFunctions_;
+            return made;
+        };
+        broker_.eft = &functions_;
+    }
+    BrokerWithInstances(const BrokerWithInstances&) = delete;
+    BrokerWithInstances& operator=(const BrokerWithInstances&) = delete;
+
+    const CMPIBroker* handle() const { return &broker_; }
+
+private:
+    inline static const CMPIBrokerEncFT* real_ = nullptr;
+    inline static CMPIInstanceFT instanceFunctions_ = {};
+    CMPIBrokerEncFT functions_;
+    CMPIBroker broker_;
+};
+
 // Harvested as C, B, A.
 inline const std::vector<ScriptedNode> ThreeSensors = {
     {Vorn::NodeLexicon::NodeType::Temperature, "/3", "C", Vorn::NodeReading{}},

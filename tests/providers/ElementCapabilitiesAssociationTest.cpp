@@ -269,6 +269,22 @@ TEST_F(ElementCapabilitiesAssociationTest, namesOfReferencesAreThePathsOfTheSame
     EXPECT_FALSE(answer_.isDone());
 }
 
+// Some brokers tell an instance's path without its namespace.
+TEST_F(ElementCapabilitiesAssociationTest, namesOfReferencesAreGivenTheRequestsNamespace)
+{
+    CMPIInstanceFT functions = Host::Instance::functions;
+    functions.getObjectPath = [](const CMPIInstance* instance, CMPIStatus* rc) {
+        CMPIObjectPath* const path = Host::Instance::functions.getObjectPath(instance, rc);
+        Host::ObjectPath::of(path)->setNameSpace(nullptr);
+        return path;
+    };
+    const BrokerWithInstances forgetful(broker(), functions);
+    SensorElementCapabilitiesProvider_Create_AssociationMI(forgetful.handle(), nullptr, nullptr);
+    expectOk(referenceNames(sensor("A:/1", "root/other")));
+    ASSERT_EQ(answer_.paths().size(), 1U);
+    EXPECT_EQ(answer_.paths()[0]->nameSpace(), "root/other");
+}
+
 TEST_F(ElementCapabilitiesWithoutSensorsTest, referencesOfCapabilitiesAreAnOpenEmptyAnswer)
 {
     expectOk(references(capabilities()));

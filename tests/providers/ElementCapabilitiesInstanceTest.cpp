@@ -159,25 +159,15 @@ TEST_F(ElementCapabilitiesInstanceTest, aPropertyListDecidesWhereTheClassIsNotKn
 TEST_F(ElementCapabilitiesInstanceTest, theFilterNamesAntecedentAndDependentAsKeys)
 {
     static std::vector<std::string> keys;
-    static CMPIInstanceFT watching;
     keys.clear();
-    watching = Host::Instance::functions;
-    watching.setPropertyFilter = [](const CMPIInstance*, const char**, const char** names) {
+    CMPIInstanceFT functions = Host::Instance::functions;
+    functions.setPropertyFilter = [](const CMPIInstance*, const char**, const char** names) {
         for (; *names != nullptr; ++names)
             keys.emplace_back(*names);
         return CMPIStatus{CMPI_RC_OK, nullptr};
     };
-    CMPIBrokerEncFT functions = *broker()->eft;
-    static const CMPIBrokerEncFT* real;
-    real = broker()->eft;
-    functions.newInstance = [](const CMPIBroker* handle, const CMPIObjectPath* at, CMPIStatus* rc) {
-        CMPIInstance* const made = real->newInstance(handle, at, rc);
-        made->ft = &watching;
-        return made;
-    };
-    CMPIBroker watched = *broker();
-    watched.eft = &functions;
-    SensorElementCapabilitiesProvider_Create_InstanceMI(&watched, nullptr, nullptr);
+    const BrokerWithInstances watched(broker(), functions);
+    SensorElementCapabilitiesProvider_Create_InstanceMI(watched.handle(), nullptr, nullptr);
     expectOk(enumerate(path(Class)));
     EXPECT_THAT(keys, ElementsAre("Antecedent", "Dependent", "Antecedent", "Dependent",
                           "Antecedent", "Dependent"));

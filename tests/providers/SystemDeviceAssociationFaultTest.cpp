@@ -60,6 +60,29 @@ TEST_F(SystemDeviceAssociationFaultTest, aTargetThatCannotBeMadeIsNoTarget)
             }
 }
 
+// Whatever the broker said of the last text that was read on the way.
+TEST_F(SystemDeviceAssociationFaultTest, aResultClassThatIsNotServedIsAnsweredWithOk)
+{
+    for (const SourceMaker& source : {Sensor, System}) {
+        const RequestKind kind = {
+            "", source, [](auto* broker, auto* context, auto* result, auto* path) {
+                CMPIAssociationMI* const mi = Kinds.associationFactory(broker, nullptr, nullptr);
+                return mi->ft->associatorNames(
+                    mi, context, result, path, Class, "CIM_LogicalDevice", nullptr, nullptr);
+            }};
+        faulty_.reset();
+        unsigned last = 0;
+        {
+            FaultyBroker counting(broker_);
+            const FaultyRequest counted(broker_, counting, kind);
+            last = counting.count(BrokerCall::getCharPtr);
+        }
+        const auto request = run(kind, {BrokerCall::getCharPtr, last, FaultManner::errorStatus});
+        EXPECT_EQ(request->status.rc, CMPI_RC_OK);
+        EXPECT_EQ(countOf(*request), 0U);
+    }
+}
+
 TEST_F(SystemDeviceAssociationFaultTest, sensorPathsThatCannotBeMadeEndInTheFactorysStatus)
 {
     for (const Which which : {AssociatorNames, References, ReferenceNames}) {

@@ -1,0 +1,101 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// Values that brokers hand over are followed only where their type and state vouch for them.
+
+#include "providers/AssociationRequests.h"
+#include "tests/support/ProviderTest.h"
+
+namespace {
+
+using namespace Vorn::SensorProfileProvider;
+using Testing::ProviderTest;
+
+constexpr CMPIValueState Unusable[] = {CMPI_nullValue, CMPI_notFound, CMPI_badValue,
+    CMPI_nullValue | CMPI_notFound, CMPI_keyValue | CMPI_nullValue};
+constexpr CMPIValueState Usable[] = {CMPI_goodValue, CMPI_keyValue};
+constexpr CMPIValueState Absent[] = {CMPI_nullValue, CMPI_notFound};
+constexpr CMPIType NoText[] = {CMPI_null, CMPI_chars, CMPI_uint64, CMPI_sint64, CMPI_boolean,
+    CMPI_ref, CMPI_instance, CMPI_stringA};
+
+class BrokerValuesTest : public ProviderTest {
+protected:
+    // What a path whose one key is this value is read as.
+    static CMPIString* readAsText(const CMPIData& key, CMPIStatus* status)
+    {
+        static CMPIData answer;
+        static CMPIObjectPathFT functions;
+        answer = key;
+        functions = Host::ObjectPath::functions;
+        functions.getKey = [](const CMPIObjectPath*, const char*, CMPIStatus* rc) {
+            *rc = {CMPI_RC_ERR_NO_SUCH_PROPERTY, nullptr};
+            return answer;
+        };
+        static int handle;
+        const CMPIObjectPath path = {&handle, &functions};
+        return textKey(&path, "Key", status);
+    }
+
+    static CMPIData dataOf(CMPIType type, CMPIValueState state, CMPIString* string)
+    {
+        CMPIData data = {type, state, {}};
+        data.value.string = string;
+        return data;
+    }
+
+    CMPIString* text_ = Host::String::make(request_->arena(), "text").handle();
+    CMPIStatus status_ = {CMPI_RC_OK, nullptr};
+};
+
+TEST_F(BrokerValuesTest, aTextKeyIsItsString)
+{
+    for (const CMPIValueState state : Usable)
+        EXPECT_EQ(readAsText(dataOf(CMPI_string, state, text_), &status_), text_);
+}
+
+TEST_F(BrokerValuesTest, aTextKeyOfAnotherTypeOrStateIsAbsentAndNoFailure)
+{
+    for (const CMPIValueState state : Unusable)
+        EXPECT_EQ(readAsText(dataOf(CMPI_string, state, text_), &status_), nullptr) << state;
+    for (const CMPIType type : NoText)
+        EXPECT_EQ(readAsText(dataOf(type, 0, text_), &status_), nullptr) << type;
+    CMPIString handleless = {nullptr, text_->ft};
+    EXPECT_EQ(readAsText(dataOf(CMPI_string, 0, &handleless), &status_), nullptr);
+    EXPECT_EQ(readAsText(dataOf(CMPI_string, 0, nullptr), &status_), nullptr);
+    EXPECT_EQ(status_.rc, CMPI_RC_OK);
+}
+
+TEST_F(BrokerValuesTest, aPathIsAPathOfAGoodStateWithAHandle)
+{
+    Host::ObjectPath& path = this->path("C");
+    CMPIData data = {CMPI_ref, 0, {}};
+    data.value.ref = path.handle();
+    EXPECT_EQ(pathOf(data), path.handle());
+    EXPECT_EQ(instanceOf(data), nullptr);
+    for (const CMPIValueState state : Absent) {
+        data.state = state;
+        EXPECT_EQ(pathOf(data), nullptr);
+    }
+    CMPIObjectPath handleless = {nullptr, path.handle()->ft};
+    data = {CMPI_ref, 0, {}};
+    data.value.ref = &handleless;
+    EXPECT_EQ(pathOf(data), nullptr);
+}
+
+TEST_F(BrokerValuesTest, anInstanceIsAnInstanceOfAGoodStateWithAHandle)
+{
+    Host::Instance& instance = request_->makeInstance(path("C"));
+    CMPIData data = {CMPI_instance, 0, {}};
+    data.value.inst = instance.handle();
+    EXPECT_EQ(instanceOf(data), instance.handle());
+    EXPECT_EQ(pathOf(data), nullptr);
+    for (const CMPIValueState state : Absent) {
+        data.state = state;
+        EXPECT_EQ(instanceOf(data), nullptr);
+    }
+    CMPIInstance handleless = {nullptr, instance.handle()->ft};
+    data = {CMPI_instance, 0, {}};
+    data.value.inst = &handleless;
+    EXPECT_EQ(instanceOf(data), nullptr);
+}
+
+} // namespace
