@@ -107,6 +107,15 @@ TEST_F(ElementCapabilitiesOfNoSensorTest, hasNoNamesInAClosedResult)
         ElementsAre(BrokerMessage{1, "SensorProfileProvider", "***No instance found***"}));
 }
 
+TEST_F(ElementCapabilitiesInstanceTest, withoutABrokerNamesFailWithoutAMessage)
+{
+    SensorElementCapabilitiesProvider_Create_AssociationMI(nullptr, nullptr, nullptr);
+    const CMPIStatus status = enumerateNames(path(Class));
+    EXPECT_EQ(status.rc, CMPI_RC_ERR_FAILED);
+    EXPECT_EQ(status.msg, nullptr);
+    expectNothing(false);
+}
+
 // ---- EnumInstances ----
 
 TEST_F(ElementCapabilitiesInstanceTest, instancesArePairsOfEachSensorInOrder)

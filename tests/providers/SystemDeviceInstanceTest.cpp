@@ -144,6 +144,16 @@ TEST_F(SystemDeviceInstanceTest, systemsThatNobodyServesAreAnOpenEmptyAnswerThat
     }
 }
 
+TEST_F(SystemDeviceInstanceTest, withoutABrokerNamesFailWithoutAMessage)
+{
+    SensorSystemDeviceProvider_Create_AssociationMI(nullptr, nullptr, nullptr);
+    const CMPIStatus status = enumerateNames(path(Class));
+    EXPECT_EQ(status.rc, CMPI_RC_ERR_FAILED);
+    EXPECT_EQ(status.msg, nullptr);
+    expectNothing(false);
+    EXPECT_TRUE(systems_.calls.empty());
+}
+
 TEST_F(SystemDeviceInstanceTest, elementsThatAreNoPathsArePassedOverInNames)
 {
     systems_.isMixed = true;
