@@ -20,7 +20,7 @@ function(sensor_profile_test name)
   add_test(NAME ${name} COMMAND ${name})
   # The settings of the person who runs the tests must not reach them.
   set_tests_properties(${name} PROPERTIES
-    ENVIRONMENT "RYNLOG_LOG=off;RYNLOG_TRACE=off;LC_ALL=C.UTF-8;${test_ENVIRONMENT}"
+    ENVIRONMENT "VORN_INSTRUMENTATION=;RYNLOG_LOG=off;RYNLOG_TRACE=off;LC_ALL=C.UTF-8;${test_ENVIRONMENT}"
     TIMEOUT 300)
 endfunction()
 

@@ -26,7 +26,7 @@ if(SENSOR_PROFILE_SANITIZE)
     add_compile_options(-fno-sanitize-recover=undefined)
   endif()
 elseif(CMAKE_BUILD_TYPE STREQUAL "Release")
-  add_compile_definitions(_FORTIFY_SOURCE=2)
+  add_compile_options(-U_FORTIFY_SOURCE -D_FORTIFY_SOURCE=2)
 endif()
 
 if(SENSOR_PROFILE_COVERAGE)

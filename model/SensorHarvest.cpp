@@ -5,10 +5,10 @@
 #include "include/ProviderException.h"
 #include "include/TracedOperation.h"
 #include "platform/instrumentation/Instrumentation.h"
+#include "platform/logging/PipeSignal.h"
 
 #include <array>
 #include <exception>
-#include <iostream>
 #include <string>
 #include <utility>
 
@@ -59,12 +59,6 @@ void require(bool accepted, const char* refusal)
 {
     if (!accepted)
         throw ProviderException(refusal);
-}
-
-// One write, so that lines of several threads stay whole.
-void reportOnStandardError(const char* what)
-{
-    std::cerr << std::string(what) + '\n' << std::flush;
 }
 
 void setIdentity(Sensor& sensor, const Instrumentation& node)
@@ -128,7 +122,7 @@ bool getSensorInstances(std::vector<Sensor>& vectSensor)
         } catch (const std::exception& error) {
             // Copied down to the base class on purpose: what is printed is its generic text.
             const std::exception generic = error;
-            reportOnStandardError(generic.what());
+            RynLog::writeToStandardError(std::string(generic.what()) + '\n');
         }
     }
     traced.exiting(732);
@@ -163,7 +157,7 @@ bool getSensorEnabledLogCapInstances(std::vector<SensorEnabledLogCap>& vectSenso
     try {
         vectSensorEnabledLogCap.push_back(SensorEnabledLogCap());
     } catch (const std::exception& error) {
-        reportOnStandardError(error.what());
+        RynLog::writeToStandardError(std::string(error.what()) + '\n');
         traced.exiting(654);
         return true;
     }

@@ -44,14 +44,20 @@ struct FailureTexts {
     const char* message; // null for no message line
 };
 
-// How the far ends of references could not be fetched.
+// The message lines of fetches that failed.
+inline constexpr const char* SensorsFailed = "getAllSensorCMPIInstances failed";
+inline constexpr const char* SensorPathsFailed = "getAllSensorCMPIObjPaths failed";
+inline constexpr const char* CapabilitiesPathsFailed =
+    "getAllSensorEnabledLogicalElementCapCMPIObjPaths failed";
+
+// What came of fetching one end's objects.
 struct FetchFailure {
-    const char* text; // of the message line; null when they could
+    const char* text; // of the message line; null when all went well
     bool hasExitMark = true;
 };
 
-// One request to an association provider: its marks and how it reports failures. The trace
-// lines it writes carry the caller's line.
+// One request to an association provider: its broker, its marks and how it reports failures. The
+// trace lines it writes carry the caller's line.
 class AssociationRequest {
 public:
     // Writes the entry mark of the function.
@@ -106,6 +112,14 @@ public:
         marks_.exit(line);
         CMReturnDone(rslt);
         return {CMPI_RC_OK, nullptr};
+    }
+
+    // The paths of all sensors.
+    FetchFailure fetchSensorPaths(SensorFactory& factory, const CMPIObjectPath* op,
+        std::vector<CMPIObjectPath*>& paths, CMPIStatus* status) const
+    {
+        return {factory.getAllSensorCMPIObjPaths(broker_, op, paths, status) ? SensorPathsFailed
+                                                                             : nullptr};
     }
 
     // Hands over one association for each far end, with the source at its other end, and ends

@@ -21,7 +21,7 @@ void reserve(const RecordClass& served, SensorFactory& factory, std::vector<Obje
 // Says that the factory failed, where the handler ends before its result is closed.
 void giveUp(const HandlerMarks& marks, const FailureLines& lines, const char* text)
 {
-    marks.failure(lines.message, text);
+    marks.failure(text, lines.message);
     marks.exit(lines.exit);
 }
 

@@ -9,10 +9,15 @@
 
 #include <cmpidt.h>
 
+#include <atomic>
 #include <cstdint>
 #include <vector>
 
 namespace Vorn::SensorProfileProvider {
+
+// A module's broker. Its factories write it while requests may run already: an object manager
+// makes an association MI when it is first asked for associations. A request reads it once.
+using ModuleBroker = std::atomic<const CMPIBroker*>;
 
 // The trace points of one handler.
 class HandlerMarks {
@@ -28,11 +33,10 @@ public:
         markProviderEntry(module_.component, function_, module_.file, line);
     }
 
-    void failure(unsigned line, const char* text) const
+    void failure(const char* text, unsigned line = __builtin_LINE()) const
     {
         traceMessage(module_, function_, line, text);
     }
-    void failure(const char* text, unsigned line = __builtin_LINE()) const { failure(line, text); }
 
     void exit(unsigned line = __builtin_LINE()) const
     {

@@ -13,41 +13,68 @@ using namespace ElementCapabilities;
 
 namespace {
 
-constexpr const char* SensorsFailed = "getAllSensorCMPIInstances failed";
-constexpr const char* SensorPathsFailed = "getAllSensorCMPIObjPaths failed";
-constexpr const char* CapabilitiesPathsFailed =
-    "getAllSensorEnabledLogicalElementCapCMPIObjPaths failed";
-
-// The text of a failed fetch; null when it did not fail.
-using Failure = const char*;
-
 // The paths of all objects of the target's class; none where this provider knows no such class.
-Failure fetchPaths(SensorFactory& factory, const CMPIObjectPath* op, const CMPIObjectPath* target,
-    bool leadsToSensors, std::vector<CMPIObjectPath*>& paths, CMPIStatus* status)
+FetchFailure fetchPaths(const AssociationRequest& request, SensorFactory& factory,
+    const CMPIObjectPath* op, const CMPIObjectPath* target, bool leadsToSensors,
+    std::vector<CMPIObjectPath*>& paths, CMPIStatus* status)
 {
     if (leadsToSensors)
-        return factory.getAllSensorCMPIObjPaths(broker, op, paths, status) ? SensorPathsFailed
-                                                                           : nullptr;
-    if (isOfClass(target, SensorEnabledLogicalElementCapClass, status))
-        return factory.getAllSensorEnabledLogicalElementCapCMPIObjPaths(broker, op, paths, status)
-                   ? CapabilitiesPathsFailed
-                   : nullptr;
-    return nullptr;
+        return request.fetchSensorPaths(factory, op, paths, status);
+    if (isOfClass(target, SensorEnabledLogicalElementCapClass, status) &&
+        factory.getAllSensorEnabledLogicalElementCapCMPIObjPaths(
+            request.broker(), op, paths, status))
+        return {CapabilitiesPathsFailed};
+    return {nullptr};
 }
 
 // The same for the objects themselves. Both failures are reported alike.
-Failure fetchInstances(SensorFactory& factory, const CMPIObjectPath* op,
-    const CMPIObjectPath* target, const char** properties, std::vector<CMPIInstance*>& instances,
-    CMPIStatus* status)
+FetchFailure fetchInstances(const AssociationRequest& request, SensorFactory& factory,
+    const CMPIObjectPath* op, const CMPIObjectPath* target, const char** properties,
+    std::vector<CMPIInstance*>& instances, CMPIStatus* status)
 {
     int result = 0;
     if (isOfClass(target, SensorClass, status))
-        result =
-            factory.getAllSensorCMPIInstances(broker, op, properties, false, instances, status);
+        result = factory.getAllSensorCMPIInstances(
+            request.broker(), op, properties, false, instances, status);
     else if (isOfClass(target, SensorEnabledLogicalElementCapClass, status))
         result = factory.getAllSensorEnabledLogicalElementCapCMPIInstances(
-            broker, op, properties, false, instances, status);
-    return result ? SensorsFailed : nullptr;
+            request.broker(), op, properties, false, instances, status);
+    return {result ? SensorsFailed : nullptr};
+}
+
+// `withoutTarget` is the failure of a source whose class has no far end.
+CMPIStatus associators(const char* function, Answer answer, const CMPIResult* rslt,
+    const CMPIObjectPath* op, const char* assocClass, const char* resultClass,
+    const char** properties, const char* withoutTarget)
+{
+    const AssociationRequest request(served(), broker, function);
+    CMPIStatus status = {CMPI_RC_OK, nullptr};
+    SensorFactory factory(true, true);
+    std::vector<CMPIInstance*> instances;
+    std::vector<CMPIObjectPath*> paths;
+    const bool wantsInstances = answer == Answer::instances;
+    const unsigned short count = factory.getNumberOfInstances();
+    wantsInstances ? instances.reserve(count) : paths.reserve(count);
+    const CMPIObjectPath* const target =
+        SensorFactory::get_assoc_targetClass_ObjectPath(request.broker(), op,
+            namedOrOwn(assocClass, SensorElementCapabilitiesClass), resultClass, &status);
+    if (!isUsable(target)) {
+        request.failWithoutTarget(withoutTarget, &status);
+        return status;
+    }
+    const FetchFailure failure =
+        wantsInstances
+            ? fetchInstances(request, factory, op, target, properties, instances, &status)
+            : fetchPaths(request, factory, op, target, isOfClass(target, SensorClass, &status),
+                  paths, &status);
+    if (failure.text != nullptr) {
+        request.marks().failure(failure.text);
+    } else {
+        returnInstances(rslt, instances);
+        returnPaths(rslt, op, paths, &status);
+    }
+    request.marks().exit();
+    return status;
 }
 
 CMPIStatus references(const char* function, Answer answer, const CMPIResult* rslt,
@@ -55,9 +82,9 @@ CMPIStatus references(const char* function, Answer answer, const CMPIResult* rsl
 {
     const AssociationRequest request(served(), broker, function);
     return request.references(answer, rslt, op, withoutTarget,
-        [op](SensorFactory& factory, const CMPIObjectPath* target, bool leadsToSensors,
+        [&](SensorFactory& factory, const CMPIObjectPath* target, bool leadsToSensors,
             std::vector<CMPIObjectPath*>& farEnds, CMPIStatus* status) {
-            return FetchFailure{fetchPaths(factory, op, target, leadsToSensors, farEnds, status)};
+            return fetchPaths(request, factory, op, target, leadsToSensors, farEnds, status);
         });
 }
 
@@ -67,47 +94,16 @@ CMPIStatus SensorElementCapabilities_Associators(CMPIAssociationMI*, const CMPIC
     const CMPIResult* rslt, const CMPIObjectPath* op, const char* assocClass,
     const char* resultClass, const char*, const char*, const char** properties)
 {
-    const AssociationRequest request(served(), broker, "SensorElementCapabilities_Associators");
-    CMPIStatus status = {CMPI_RC_OK, nullptr};
-    SensorFactory factory(true, true);
-    std::vector<CMPIInstance*> instances;
-    instances.reserve(factory.getNumberOfInstances());
-    const CMPIObjectPath* const target = SensorFactory::get_assoc_targetClass_ObjectPath(
-        broker, op, namedOrOwn(assocClass, SensorElementCapabilitiesClass), resultClass, &status);
-    if (!isUsable(target)) {
-        request.failWithoutTarget("Object Path is NULL in Associators", &status);
-        return status;
-    }
-    if (const Failure failure = fetchInstances(factory, op, target, properties, instances, &status))
-        request.marks().failure(failure);
-    else
-        returnInstances(rslt, instances);
-    request.marks().exit();
-    return status;
+    return associators("SensorElementCapabilities_Associators", Answer::instances, rslt, op,
+        assocClass, resultClass, properties, "Object Path is NULL in Associators");
 }
 
 CMPIStatus SensorElementCapabilities_AssociatorNames(CMPIAssociationMI*, const CMPIContext*,
     const CMPIResult* rslt, const CMPIObjectPath* op, const char* assocClass,
     const char* resultClass, const char*, const char*)
 {
-    const AssociationRequest request(served(), broker, "SensorElementCapabilities_AssociatorNames");
-    CMPIStatus status = {CMPI_RC_OK, nullptr};
-    SensorFactory factory(true, true);
-    std::vector<CMPIObjectPath*> paths;
-    paths.reserve(factory.getNumberOfInstances());
-    const CMPIObjectPath* const target = SensorFactory::get_assoc_targetClass_ObjectPath(
-        broker, op, namedOrOwn(assocClass, SensorElementCapabilitiesClass), resultClass, &status);
-    if (!isUsable(target)) {
-        request.failWithoutTarget("Object Path is NULL in AssociatorsNames", &status);
-        return status;
-    }
-    const bool leadsToSensors = isOfClass(target, SensorClass, &status);
-    if (const Failure failure = fetchPaths(factory, op, target, leadsToSensors, paths, &status))
-        request.marks().failure(failure);
-    else
-        returnPaths(rslt, op, paths, &status);
-    request.marks().exit();
-    return status;
+    return associators("SensorElementCapabilities_AssociatorNames", Answer::paths, rslt, op,
+        assocClass, resultClass, nullptr, "Object Path is NULL in AssociatorsNames");
 }
 
 CMPIStatus SensorElementCapabilities_References(CMPIAssociationMI*, const CMPIContext*,

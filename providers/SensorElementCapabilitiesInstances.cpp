@@ -113,19 +113,19 @@ int sensorElementCapabilitiesCMPIInstances(
     walk.reserve(out);
     // Not the names of this association's references, but what the filter has always held.
     const char* keys[] = {"Antecedent", "Dependent", nullptr};
-    const WalkEnd end =
-        walk.run([&](const CMPIObjectPath* association, const References& references) {
-            out.push_back(newAssociation(broker, association, references, properties, keys));
-        });
+    const WalkEnd end = walk.run([&](const CMPIObjectPath* association,
+                                     const References& references) {
+        out.push_back(newAssociation(request.broker(), association, references, properties, keys));
+    });
     if (end == WalkEnd::atSensors) {
-        traceToBroker(broker, CMPI_LEV_WARNING, SensorElementCapabilitiesProvider,
+        traceToBroker(request.broker(), CMPI_LEV_WARNING, SensorElementCapabilitiesProvider,
             "***Can't get Sensor ObjectPaths.             Exiting EnumerateInstanceNames***");
-        request.marks().failure("getAllSensorCMPIObjPaths failed");
+        request.marks().failure(SensorPathsFailed);
     } else if (end == WalkEnd::atCapabilities) {
-        traceToBroker(broker, CMPI_LEV_WARNING, SensorElementCapabilitiesProvider,
+        traceToBroker(request.broker(), CMPI_LEV_WARNING, SensorElementCapabilitiesProvider,
             "***Can't get ObjectPaths for                 EnabledLogicalElementCap"
             "                 Exiting EnumerateInstanceNames***");
-        request.marks().failure("getAllSensorEnabledLogicalElementCapCMPIObjPaths failed");
+        request.marks().failure(CapabilitiesPathsFailed);
     }
     request.marks().exit();
     return end == WalkEnd::complete ? 0 : 1;

@@ -16,7 +16,7 @@ const std::string loggerSensorElementCapabilities = "Nimbrel.SensorElementCapabi
 
 } // namespace
 
-const CMPIBroker* ElementCapabilities::broker = nullptr;
+constinit ModuleBroker ElementCapabilities::broker = nullptr;
 
 AssociationClass ElementCapabilities::served()
 {

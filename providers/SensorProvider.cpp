@@ -5,6 +5,7 @@
 #include "factory/ClassNames.h"
 #include "providers/InstanceRequests.h"
 #include "providers/NotSupported.h"
+#include "providers/RequestHandler.h"
 
 #include <string>
 
@@ -12,7 +13,7 @@ namespace Vorn::SensorProfileProvider {
 
 namespace {
 
-const CMPIBroker* broker = nullptr;
+constinit ModuleBroker broker = nullptr;
 
 const std::string loggerSensorProvider = "Nimbrel.SensorProfileProvider";
 

@@ -15,7 +15,7 @@ namespace Vorn::SensorProfileProvider {
 
 namespace SystemDevice {
 
-extern const CMPIBroker* broker; // written by the factories, before requests come
+extern ModuleBroker broker;
 
 AssociationClass served();
 

@@ -15,8 +15,6 @@ using namespace SystemDevice;
 namespace {
 
 constexpr const char* UpcallFailed = "Call to CBEnumInstances of target Class Failed.";
-constexpr const char* SensorsFailed = "getAllSensorCMPIInstances failed";
-constexpr const char* SensorPathsFailed = "getAllSensorCMPIObjPaths failed";
 
 // Whether a client that named this result class wants objects of the class, or of the standard
 // class it is derived from.
@@ -26,14 +24,15 @@ bool wants(const char* resultClass, const char* className, const char* standardC
            isSameName(resultClass, standardClass);
 }
 
-// Hands over what the object manager knows of the target's class. False when it fails.
-bool returnSystems(Answer answer, const CMPIContext* ctx, const CMPIResult* rslt,
-    const CMPIObjectPath* target, CMPIStatus* status)
+// Hands over what the object manager knows of the target's class. False when the up-call fails;
+// a failure while its answer is read stands in the status alone.
+bool returnSystems(const AssociationRequest& request, Answer answer, const CMPIContext* ctx,
+    const CMPIResult* rslt, const CMPIObjectPath* target, CMPIStatus* status)
 {
     const bool wantsInstances = answer == Answer::instances;
     const CMPIEnumeration* const systems =
-        wantsInstances ? CBEnumInstances(broker, ctx, target, nullptr, status)
-                       : CBEnumInstanceNames(broker, ctx, target, status);
+        wantsInstances ? CBEnumInstances(request.broker(), ctx, target, nullptr, status)
+                       : CBEnumInstanceNames(request.broker(), ctx, target, status);
     if (status->rc != CMPI_RC_OK)
         return false;
     forEachElement(systems, status, [&](const CMPIData& element) {
@@ -48,24 +47,25 @@ bool returnSystems(Answer answer, const CMPIContext* ctx, const CMPIResult* rslt
     return true;
 }
 
-// Hands over the sensors. The text of the failure, null when there is none.
-const char* returnSensors(Answer answer, const CMPIResult* rslt, const CMPIObjectPath* op,
-    const char** properties, SensorFactory& factory, CMPIStatus* status)
+// Hands over the sensors.
+FetchFailure returnSensors(const AssociationRequest& request, Answer answer, const CMPIResult* rslt,
+    const CMPIObjectPath* op, const char** properties, SensorFactory& factory, CMPIStatus* status)
 {
     if (answer == Answer::instances) {
         std::vector<CMPIInstance*> instances;
         instances.reserve(factory.getNumberOfInstances());
-        if (factory.getAllSensorCMPIInstances(broker, op, properties, false, instances, status))
-            return SensorsFailed;
+        if (factory.getAllSensorCMPIInstances(
+                request.broker(), op, properties, false, instances, status))
+            return {SensorsFailed};
         returnInstances(rslt, instances);
-        return nullptr;
+        return {nullptr};
     }
     std::vector<CMPIObjectPath*> paths;
     paths.reserve(factory.getNumberOfInstances());
-    if (factory.getAllSensorCMPIObjPaths(broker, op, paths, status))
-        return SensorPathsFailed;
-    returnPaths(rslt, op, paths, status);
-    return nullptr;
+    const FetchFailure failure = request.fetchSensorPaths(factory, op, paths, status);
+    if (failure.text == nullptr)
+        returnPaths(rslt, op, paths, status);
+    return failure;
 }
 
 CMPIStatus associators(const char* function, Answer answer, const CMPIContext* ctx,
@@ -76,8 +76,9 @@ CMPIStatus associators(const char* function, Answer answer, const CMPIContext* c
     const AssociationRequest request(served(), broker, function);
     CMPIStatus status = Ok;
     SensorFactory factory(true, false);
-    const CMPIObjectPath* const target = SensorFactory::get_assoc_targetClass_ObjectPath(
-        broker, op, namedOrOwn(assocClass, SensorSystemDeviceClass), resultClass, &status);
+    const CMPIObjectPath* const target =
+        SensorFactory::get_assoc_targetClass_ObjectPath(request.broker(), op,
+            namedOrOwn(assocClass, SensorSystemDeviceClass), resultClass, &status);
     if (!isUsable(target)) {
         request.marks().exit();
         return Ok; // another provider's source or association
@@ -85,16 +86,17 @@ CMPIStatus associators(const char* function, Answer answer, const CMPIContext* c
     if (isOfClass(target, ComputerSystemClass, &status)) {
         if (!wants(resultClass, ComputerSystemClass, "CIM_ComputerSystem"))
             return Ok; // without an exit mark
-        if (!returnSystems(answer, ctx, rslt, target, &status)) {
+        if (!returnSystems(request, answer, ctx, rslt, target, &status)) {
             request.marks().failure(UpcallFailed);
             return status; // without an exit mark
         }
     } else if (isOfClass(target, SensorClass, &status)) {
         if (!wants(resultClass, SensorClass, "CIM_NumericSensor"))
             return Ok; // without an exit mark
-        if (const char* const failure =
-                returnSensors(answer, rslt, op, properties, factory, &status))
-            request.marks().failure(failure);
+        const FetchFailure failure =
+            returnSensors(request, answer, rslt, op, properties, factory, &status);
+        if (failure.text != nullptr)
+            request.marks().failure(failure.text);
     }
     request.marks().exit();
     return status;
@@ -102,16 +104,16 @@ CMPIStatus associators(const char* function, Answer answer, const CMPIContext* c
 
 // The far ends of the source's associations, of the target's class. A failed up-call leaves the
 // exit mark out, as it does for associated objects.
-FetchFailure fetchFarEnds(const CMPIContext* ctx, const CMPIObjectPath* op,
-    const CMPIObjectPath* target, bool leadsToSensors, SensorFactory& factory,
-    std::vector<CMPIObjectPath*>& farEnds, CMPIStatus* status)
+FetchFailure fetchFarEnds(const AssociationRequest& request, const CMPIContext* ctx,
+    const CMPIObjectPath* op, const CMPIObjectPath* target, bool leadsToSensors,
+    SensorFactory& factory, std::vector<CMPIObjectPath*>& farEnds, CMPIStatus* status)
 {
     if (leadsToSensors)
-        return {factory.getAllSensorCMPIObjPaths(broker, op, farEnds, status) ? SensorPathsFailed
-                                                                              : nullptr};
+        return request.fetchSensorPaths(factory, op, farEnds, status);
     if (!isOfClass(target, ComputerSystemClass, status))
         return {nullptr};
-    const CMPIEnumeration* const systems = CBEnumInstanceNames(broker, ctx, target, status);
+    const CMPIEnumeration* const systems =
+        CBEnumInstanceNames(request.broker(), ctx, target, status);
     const bool isWhole =
         status->rc == CMPI_RC_OK && forEachElement(systems, status, [&](const CMPIData& element) {
             if (CMPIObjectPath* const system = pathOf(element))
@@ -126,9 +128,9 @@ CMPIStatus references(const char* function, Answer answer, const CMPIContext* ct
 {
     const AssociationRequest request(served(), broker, function);
     return request.references(answer, rslt, op, withoutTarget,
-        [ctx, op](SensorFactory& factory, const CMPIObjectPath* target, bool leadsToSensors,
+        [&](SensorFactory& factory, const CMPIObjectPath* target, bool leadsToSensors,
             std::vector<CMPIObjectPath*>& farEnds, CMPIStatus* status) {
-            return fetchFarEnds(ctx, op, target, leadsToSensors, factory, farEnds, status);
+            return fetchFarEnds(request, ctx, op, target, leadsToSensors, factory, farEnds, status);
         });
 }
 

@@ -61,7 +61,7 @@ public:
             return WalkEnd::withoutSystemPath;
         }
         const CMPIEnumeration* const systems =
-            CBEnumInstanceNames(broker, ctx_, systemClass, status());
+            CBEnumInstanceNames(request().broker(), ctx_, systemClass, status());
         if (status()->rc != CMPI_RC_OK)
             return WalkEnd::atUpcall;
         WalkEnd end = WalkEnd::complete;
@@ -77,9 +77,9 @@ private:
     CMPIObjectPath* newSystemPath() const
     {
         const char* const nameSpace = nameSpaceOf(op(), status());
-        if (nameSpace == nullptr || broker == nullptr)
+        if (nameSpace == nullptr || request().broker() == nullptr)
             return nullptr;
-        return CMNewObjectPath(broker, nameSpace, ComputerSystemClass, status());
+        return CMNewObjectPath(request().broker(), nameSpace, ComputerSystemClass, status());
     }
 
     template <typename Visit>
@@ -115,10 +115,10 @@ int sensorSystemDeviceCMPIInstances(const CMPIObjectPath* op, const char** prope
     PairWalk walk(request, InstanceFailures, ctx, op, &status);
     walk.reserve(out);
     const char* keys[] = {"GroupComponent", "PartComponent", nullptr};
-    const WalkEnd end =
-        walk.run([&](const CMPIObjectPath* association, const References& references) {
-            out.push_back(newAssociation(broker, association, references, properties, keys));
-        });
+    const WalkEnd end = walk.run([&](const CMPIObjectPath* association,
+                                     const References& references) {
+        out.push_back(newAssociation(request.broker(), association, references, properties, keys));
+    });
     // The other ends leave without an exit mark.
     if (end == WalkEnd::complete || end == WalkEnd::withoutSystemPath)
         request.marks().exit();
@@ -138,8 +138,8 @@ CMPIStatus SensorSystemDevice_EnumInstanceNames(
         });
     if (end == WalkEnd::atUpcall) {
         // Nobody serves computer systems, which is no failure of this provider.
-        CMSetStatusWithChars(
-            broker, &status, CMPI_RC_OK, "CBEnumInstanceNames Failed for the ZUMLO_ComputerSystem");
+        CMSetStatusWithChars(request.broker(), &status, CMPI_RC_OK,
+            "CBEnumInstanceNames Failed for the ZUMLO_ComputerSystem");
         return status;
     }
     const bool isAnswered =

@@ -16,7 +16,7 @@ const std::string loggerSenosrSystemDeviceProvider = "Nimbrel.SenosrSystemDevice
 
 } // namespace
 
-const CMPIBroker* SystemDevice::broker = nullptr;
+constinit ModuleBroker SystemDevice::broker = nullptr;
 
 AssociationClass SystemDevice::served()
 {

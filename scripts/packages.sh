@@ -28,9 +28,9 @@ bench_packages=(
 missing_packages() {
   local package
   for package in "$@"; do
-    if [ "$(dpkg-query --show --showformat='${db:Status-Status}' "$package" 2>/dev/null)" != installed ]; then
-      echo "$package"
-    fi
+    # A line for each architecture it is installed for.
+    dpkg-query --show --showformat='${db:Status-Status}\n' "$package" 2>/dev/null |
+      grep --quiet --line-regexp installed || echo "$package"
   done
 }
 
@@ -49,7 +49,8 @@ install_packages() {
     as_root=(sudo)
   fi
   echo "Installing ${missing[*]}" >&2
+  # A machine that has just started may be updating itself.
   "${as_root[@]}" apt-get update --quiet=2 >&2 &&
     "${as_root[@]}" env DEBIAN_FRONTEND=noninteractive \
-      apt-get install --yes --quiet=2 --no-install-recommends "${missing[@]}" >&2
+      apt-get -o DPkg::Lock::Timeout=300 install --yes --quiet=2 --no-install-recommends "${missing[@]}" >&2
 }

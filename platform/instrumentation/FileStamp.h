@@ -4,28 +4,37 @@
 
 #pragma once
 
+#include <compare>
 #include <cstdint>
 
 #include <sys/stat.h>
 
 namespace Vorn {
 
+// Since 1970. Both numbers as the kernel gives them: file times reach beyond what an int64 of
+// nanoseconds can hold.
+struct FileTime {
+    std::int64_t seconds = 0;
+    std::int64_t nanoseconds = 0;
+
+    auto operator<=>(const FileTime&) const = default;
+};
+
 struct FileStamp {
     std::uint64_t device = 0;
     std::uint64_t inode = 0;
     std::int64_t size = 0;
-    std::int64_t modified = 0; // nanoseconds since 1970
-    std::int64_t changed = 0;  // the same; moves also when a tool sets the time of modification
+    FileTime modified;
+    FileTime changed; // moves also when a tool sets the time of modification
 
     bool operator==(const FileStamp&) const = default;
 };
 
 inline FileStamp stampOf(const struct stat& status)
 {
-    constexpr std::int64_t nanosecondsPerSecond = 1'000'000'000;
     return {status.st_dev, status.st_ino, status.st_size,
-        status.st_mtim.tv_sec * nanosecondsPerSecond + status.st_mtim.tv_nsec,
-        status.st_ctim.tv_sec * nanosecondsPerSecond + status.st_ctim.tv_nsec};
+        {status.st_mtim.tv_sec, status.st_mtim.tv_nsec},
+        {status.st_ctim.tv_sec, status.st_ctim.tv_nsec}};
 }
 
 } // namespace Vorn

@@ -100,8 +100,10 @@ FileContent readRegularFile(const std::string& path, std::size_t limit)
 bool isSettled(const FileStamp& stamp)
 {
     constexpr auto tick = std::chrono::milliseconds(50);
-    const auto now = std::chrono::system_clock::now().time_since_epoch();
-    return now - std::chrono::nanoseconds(std::max(stamp.changed, stamp.modified)) > tick;
+    const auto before = (std::chrono::system_clock::now() - tick).time_since_epoch();
+    const auto seconds = std::chrono::floor<std::chrono::seconds>(before);
+    const FileTime settled{seconds.count(), std::chrono::nanoseconds(before - seconds).count()};
+    return std::max(stamp.changed, stamp.modified) < settled;
 }
 
 } // namespace Vorn

@@ -5,6 +5,8 @@
 #include <cerrno>
 #include <ctime>
 
+#include <unistd.h>
+
 namespace RynLog {
 
 PipeSignalBlocked::PipeSignalBlocked() noexcept
@@ -27,6 +29,25 @@ void PipeSignalBlocked::discard() const noexcept
         return;
     const timespec now{};
     while (::sigtimedwait(&pipeSignal_, nullptr, &now) < 0 && errno == EINTR) {}
+}
+
+void writeWhole(int descriptor, std::string_view bytes) noexcept
+{
+    const PipeSignalBlocked pipeSignal;
+    while (!bytes.empty()) {
+        const ssize_t written = ::write(descriptor, bytes.data(), bytes.size());
+        if (written > 0)
+            bytes.remove_prefix(static_cast<std::size_t>(written));
+        else if (written == 0 || errno != EINTR)
+            break;
+    }
+    if (!bytes.empty() && errno == EPIPE)
+        pipeSignal.discard();
+}
+
+void writeToStandardError(std::string_view text) noexcept
+{
+    writeWhole(STDERR_FILENO, text);
 }
 
 } // namespace RynLog

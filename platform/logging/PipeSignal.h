@@ -5,6 +5,7 @@
 #pragma once
 
 #include <csignal>
+#include <string_view>
 
 namespace RynLog {
 
@@ -25,5 +26,11 @@ private:
     sigset_t before_{};
     bool wasPending_ = false; // a signal that is somebody else's business
 };
+
+// Writes the bytes, as many as can be written, whoever reads them or has gone.
+void writeWhole(int descriptor, std::string_view bytes) noexcept;
+
+// One write to the process's standard error, so that lines of several threads stay whole.
+void writeToStandardError(std::string_view text) noexcept;
 
 } // namespace RynLog

@@ -24,20 +24,6 @@ namespace {
 
 using LockedSink = spdlog::sinks::base_sink<std::mutex>;
 
-void writeWhole(int descriptor, std::string_view bytes)
-{
-    const PipeSignalBlocked pipeSignal;
-    while (!bytes.empty()) {
-        const ssize_t written = ::write(descriptor, bytes.data(), bytes.size());
-        if (written > 0)
-            bytes.remove_prefix(static_cast<std::size_t>(written));
-        else if (written == 0 || errno != EINTR)
-            break;
-    }
-    if (!bytes.empty() && errno == EPIPE)
-        pipeSignal.discard();
-}
-
 // One line is one write to an open file, unbuffered, so that lines of several threads and
 // processes stay whole.
 class DescriptorSink : public LockedSink {

@@ -12,6 +12,8 @@
 
 #include <sstream>
 
+#include <unistd.h>
+
 namespace {
 
 using namespace Vorn::SensorProfileProvider;
@@ -70,6 +72,23 @@ TEST(Harvest, ofAMachineWithoutSensorsReportsThatNothingWasFound)
     EXPECT_TRUE(result.nothing);
     EXPECT_TRUE(result.sensors.empty());
     EXPECT_EQ(result.standardError, "");
+}
+
+TEST(Harvest, thatFailsOutlivesAStandardErrorThatNobodyReads)
+{
+    ScriptedMachine machine;
+    machine.failConstruction();
+    int ends[2];
+    ASSERT_EQ(pipe(ends), 0);
+    close(ends[0]);
+    const int standardError = dup(STDERR_FILENO);
+    dup2(ends[1], STDERR_FILENO);
+    std::vector<Sensor> sensors;
+    const bool nothing = getSensorInstances(sensors); // SIGPIPE would end the program here
+    dup2(standardError, STDERR_FILENO);
+    close(standardError);
+    close(ends[1]);
+    EXPECT_TRUE(nothing);
 }
 
 TEST(Harvest, goesThroughTemperaturesThenVoltagesThenTachometers)

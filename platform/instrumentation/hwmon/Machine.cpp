@@ -68,7 +68,8 @@ std::string fileFingerprint(const fs::path& path)
         return {};
     const FileStamp stamp = stampOf(status);
     std::string fingerprint = path.string();
-    for (const auto number : {stamp.size, stamp.modified, stamp.changed})
+    for (const auto number : {stamp.size, stamp.modified.seconds, stamp.modified.nanoseconds,
+             stamp.changed.seconds, stamp.changed.nanoseconds})
         fingerprint += ' ' + std::to_string(number);
     return fingerprint + ' ' + std::to_string(stamp.device) + ' ' + std::to_string(stamp.inode) +
            '\n';

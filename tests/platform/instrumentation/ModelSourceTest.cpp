@@ -94,6 +94,18 @@ TEST_F(ModelFileTest, isReadAfreshThoughItsTimeWasSetBack)
     EXPECT_EQ(walk().at(0).description, "two");
 }
 
+TEST_F(ModelFileTest, isReadWhateverTimeItClaims)
+{
+    write(modelOf("one"));
+    const timespec farFuture = {10'413'792'000, 999'999'999}; // the year 2300
+    const timespec longAgo = {-2'000'000'000, 0};
+    for (const timespec& time : {farFuture, longAgo}) {
+        const timespec times[] = {time, time};
+        ASSERT_EQ(utimensat(AT_FDCWD, path().c_str(), times, 0), 0);
+        EXPECT_EQ(walk().at(0).description, "one");
+    }
+}
+
 TEST_F(ModelFileTest, isNotReadAgainWhileItStays)
 {
     write(modelOf("one"));
