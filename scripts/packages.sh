@@ -8,7 +8,7 @@ build_packages=(
   g++ cmake ninja-build
   gettext
   libboost-locale-dev libcli11-dev libfmt-dev libsensors-dev libspdlog-dev nlohmann-json3-dev
-  tao-pegtl-dev
+  libpugixml-dev tao-pegtl-dev
   nettle-dev pkg-config
 )
 

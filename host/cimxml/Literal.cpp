@@ -1,0 +1,190 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "host/cimxml/Literal.h"
+
+#include "host/broker/DateTime.h"
+#include "host/broker/Names.h"
+#include "host/broker/Refusal.h"
+#include "host/broker/Types.h"
+#include "host/cimxml/Characters.h"
+#include "host/repository/Words.h"
+
+#include <array>
+#include <charconv>
+#include <cmath>
+#include <limits>
+
+namespace Host::CimXml {
+
+namespace {
+
+struct Magnitude {
+    bool isNegative = false;
+    std::uint64_t value = 0;
+};
+
+template <typename Number, typename... Base>
+bool readsWhole(std::string_view text, Number& number, Base... base)
+{
+    const char* const end = text.data() + text.size();
+    const auto result = std::from_chars(text.data(), end, number, base...);
+    return result.ec == std::errc() && result.ptr == end && !text.empty();
+}
+
+std::optional<Magnitude> magnitudeOf(std::string_view text)
+{
+    Magnitude number;
+    number.isNegative = text.starts_with('-');
+    if (text.starts_with('-') || text.starts_with('+'))
+        text.remove_prefix(1);
+    const bool isHexadecimal = text.starts_with("0x") || text.starts_with("0X");
+    if (isHexadecimal)
+        text.remove_prefix(2);
+    if (!readsWhole(text, number.value, isHexadecimal ? 16 : 10))
+        return std::nullopt;
+    return number;
+}
+
+std::optional<Value> readInteger(CMPIType type, std::string_view text)
+{
+    const auto number = magnitudeOf(text);
+    if (!number)
+        return std::nullopt;
+    const auto bits = static_cast<unsigned>(plainSize(type)) * 8;
+    const std::uint64_t all = std::numeric_limits<std::uint64_t>::max() >> (64U - bits);
+    const std::uint64_t half = all / 2;
+    const std::uint64_t most = isUnsignedType(type) ? (number->isNegative ? 0 : all)
+                                                    : (number->isNegative ? half + 1 : half);
+    if (number->value > most)
+        return std::nullopt;
+    return Value::integer(type, number->isNegative ? 0 - number->value : number->value);
+}
+
+std::optional<Value> readReal(CMPIType type, std::string_view text)
+{
+    if (text.starts_with('+'))
+        text.remove_prefix(1);
+    double number = 0;
+    if (!readsWhole(text, number))
+        return std::nullopt;
+    if (type == CMPI_real32 && std::isfinite(number) &&
+        std::abs(number) > std::numeric_limits<float>::max())
+        return std::nullopt;
+    return Value::real(type, number);
+}
+
+std::optional<Value> readBoolean(std::string_view text)
+{
+    if (!equalNames(text, "true") && !equalNames(text, "false"))
+        return std::nullopt;
+    return Value::boolean(equalNames(text, "true"));
+}
+
+std::optional<Value> readCharacter(std::string_view text)
+{
+    if (text.empty())
+        return std::nullopt;
+    const Character character = firstCharacter(text);
+    if (!character.isValid || character.size != text.size() || character.code > 0xFFFF)
+        return std::nullopt;
+    return Value::integer(CMPI_char16, character.code);
+}
+
+std::optional<Value> readDateTime(Arena& arena, std::string_view text)
+{
+    try {
+        return Value::of(DateTime::parse(arena, text));
+    } catch (const Refusal&) {
+        return std::nullopt;
+    }
+}
+
+// The shortest text that reads back as the same number, with the point the protocol wants.
+std::string writeReal(CMPIType type, double number)
+{
+    if (std::isnan(number))
+        return "NaN";
+    if (std::isinf(number))
+        return number < 0 ? "-INF" : "INF";
+    std::array<char, 32> buffer{};
+    const auto end = type == CMPI_real32
+                         ? std::to_chars(buffer.begin(), buffer.end(), static_cast<float>(number))
+                         : std::to_chars(buffer.begin(), buffer.end(), number);
+    std::string text(buffer.begin(), end.ptr);
+    if (text.find('.') == std::string::npos)
+        text.insert(std::min(text.find('e'), text.size()), ".0");
+    return text;
+}
+
+} // namespace
+
+std::optional<CMPIType> typeNamed(std::string_view word)
+{
+    if (equalNames(word, "reference"))
+        return CMPI_ref;
+    const CMPIType type = dataTypeNamed(word);
+    return type == CMPI_null || type == CMPI_ref ? std::nullopt : std::optional(type);
+}
+
+std::string nameOf(CMPIType type)
+{
+    switch (elementType(type)) {
+    case CMPI_ref:
+        return "reference";
+    case CMPI_null:
+    case CMPI_instance:
+        return "string";
+    default:
+        return nameOfType(elementType(type));
+    }
+}
+
+std::optional<Value> readLiteral(Arena& arena, CMPIType type, std::string_view text)
+{
+    if (isTextType(type))
+        return Value::text(arena, text);
+    if (type == CMPI_char16)
+        return readCharacter(text);
+    text = trimmed(text);
+    if (type == CMPI_boolean)
+        return readBoolean(text);
+    if (type == CMPI_dateTime)
+        return readDateTime(arena, text);
+    if (type == CMPI_real32 || type == CMPI_real64)
+        return readReal(type, text);
+    return readInteger(type, text);
+}
+
+std::optional<Value> readNumber(Arena& arena, std::string_view text)
+{
+    for (const CMPIType type :
+        std::initializer_list<CMPIType>{CMPI_uint64, CMPI_sint64, CMPI_real64})
+        if (const auto value = readLiteral(arena, type, text))
+            return value;
+    return std::nullopt;
+}
+
+std::string writeLiteral(const Value& value)
+{
+    if (const auto text = value.text())
+        return std::string(*text);
+    if (const auto truth = value.boolean())
+        return *truth ? "TRUE" : "FALSE";
+    if (const auto number = value.unsignedInteger()) {
+        if (value.type() != CMPI_char16)
+            return std::to_string(*number);
+        std::string character;
+        const auto code = static_cast<char32_t>(*number);
+        appendUtf8(character, isXmlCharacter(code) ? code : U'\xFFFD');
+        return character;
+    }
+    if (const auto number = value.signedInteger())
+        return std::to_string(*number);
+    if (const auto number = value.real())
+        return writeReal(value.type(), *number);
+    if (const DateTime* const time = value.dateTime())
+        return time->toText();
+    return {};
+}
+
+} // namespace Host::CimXml

@@ -1,0 +1,23 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// Where things stand in a message.
+
+#pragma once
+
+#include "host/cimxml/Element.h"
+
+#include <string>
+
+namespace Host::CimXml {
+
+// The IMETHODCALL or METHODCALL. REQUIRES: the document is a Message's.
+Element callOf(const Document& document);
+
+// The LOCALNAMESPACEPATH of an IMETHODCALL; the LOCALCLASSPATH or LOCALINSTANCEPATH of a
+// METHODCALL.
+Element pathOf(const Element& call);
+
+// The names in a LOCALNAMESPACEPATH, with slashes between them.
+std::string nameSpaceOf(const Element& localNameSpacePath);
+
+} // namespace Host::CimXml

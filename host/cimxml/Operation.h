@@ -1,0 +1,100 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// An operation with its parameters, as a dispatcher needs it.
+
+#pragma once
+
+#include "host/broker/Value.h"
+#include "host/cimxml/PropertySelection.h"
+
+#include <cstdint>
+#include <optional>
+#include <string>
+#include <string_view>
+#include <vector>
+
+namespace Host {
+class Instance;
+class ObjectPath;
+class Repository;
+} // namespace Host
+
+namespace Host::CimXml {
+
+class Message;
+
+enum class OperationKind {
+    getInstance,
+    enumerateInstances,
+    enumerateInstanceNames,
+    createInstance,
+    modifyInstance,
+    deleteInstance,
+    getProperty,
+    setProperty,
+    execQuery,
+    associators,
+    associatorNames,
+    references,
+    referenceNames,
+    getClass,
+    enumerateClasses,
+    enumerateClassNames,
+    getQualifier,
+    enumerateQualifiers,
+    openEnumerateInstances,
+    openEnumerateInstancePaths,
+    openAssociatorInstances,
+    openAssociatorInstancePaths,
+    openReferenceInstances,
+    openReferenceInstancePaths,
+    pullInstancesWithPath,
+    pullInstancePaths,
+    closeEnumeration,
+    invokeMethod, // of a class; its arguments are not read
+};
+
+// What an operation does not take, and what the client did not give, is as here; flags have the
+// defaults of their operation. Namespaces and classes are spelled as they are declared, or as the
+// client spells them where they are not.
+struct Operation {
+    OperationKind kind = OperationKind::getInstance;
+    std::string nameSpace;
+
+    std::string className;              // the path's, where there is one; empty for all classes
+    const ObjectPath* path = nullptr;   // of the instance, or of an association's source
+    const Instance* instance = nullptr; // the new or modified one
+
+    bool deepInheritance = false;
+    PropertySelection selection; // with LocalOnly and the like, and the property list
+
+    // References have their association class in resultClass.
+    std::string associationClass;
+    std::string resultClass;
+    std::string role;
+    std::string resultRole;
+
+    std::string propertyName;
+    std::string qualifierName;
+    Value newValue;
+    std::string methodName;
+
+    std::string queryLanguage; // of ExecQuery, or of the filter of an enumeration
+    std::string query;
+    std::optional<std::uint32_t> operationTimeout; // in seconds
+    bool continueOnError = false;
+    std::uint32_t maxObjectCount = 0;
+    std::string enumerationContext;
+};
+
+// Reads the call. Paths, instances and values live in the arena of this thread's request, which
+// must be there. Throws RequestError for elements that lack something, and Refusal:
+//
+//   CMPI_RC_ERR_INVALID_NAMESPACE   there is no such namespace
+//   CMPI_RC_ERR_NOT_SUPPORTED       an operation that is not offered
+//   CMPI_RC_ERR_INVALID_PARAMETER   a parameter that is missing, unknown, given twice or of
+//                                   another kind, or a value that does not fit; it is named
+//   CMPI_RC_ERR_INVALID_CLASS       a key without name, of a class that is not known
+Operation readOperation(const Message& message, const Repository& classes);
+
+} // namespace Host::CimXml

@@ -1,0 +1,288 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "host/broker/Names.h"
+#include "host/broker/ObjectPath.h"
+#include "host/broker/Refusal.h"
+#include "host/cimxml/InstanceReader.h"
+#include "host/cimxml/Literal.h"
+#include "host/cimxml/Message.h"
+#include "host/cimxml/MessageParts.h"
+#include "host/cimxml/OperationTable.h"
+#include "host/repository/MofError.h"
+#include "host/repository/Words.h"
+
+#include <array>
+
+namespace Host::CimXml {
+
+namespace {
+
+using P = Parameter;
+
+[[noreturn]] void refuse(const std::string& reason)
+{
+    throw Refusal(CMPI_RC_ERR_INVALID_PARAMETER, reason);
+}
+
+std::string described(Parameter parameter)
+{
+    return "parameter " + std::string(nameOf(parameter));
+}
+
+// The parameters of one call, found by name.
+class Parameters {
+public:
+    Parameters(const OperationForm& form, const Element& call) : form_(form)
+    {
+        for (const Element& child : call.children({"LOCALNAMESPACEPATH", "IPARAMVALUE"}))
+            if (child.is("IPARAMVALUE"))
+                add(child);
+        for (std::size_t at = 0; at < ParameterCount; ++at)
+            if (form.required.has(static_cast<P>(at)) && !values_[at])
+                refuse(std::string(form.name) + " needs " + described(static_cast<P>(at)));
+    }
+
+    // Nothing when it was not given, or without a value.
+    const std::optional<Element>& operator[](P parameter) const
+    {
+        return values_[static_cast<std::size_t>(parameter)];
+    }
+
+    // The same; throws when it is of another kind.
+    std::optional<Element> get(P parameter, std::string_view kind) const
+    {
+        const std::optional<Element>& value = (*this)[parameter];
+        if (value && !value->is(kind))
+            refuse(described(parameter) + " must be a " + std::string(kind) + ", not a " +
+                   std::string(value->name()));
+        return value;
+    }
+
+    std::string text(P parameter) const
+    {
+        const auto value = get(parameter, "VALUE");
+        return value ? value->content() : std::string();
+    }
+
+    bool flag(P parameter) const
+    {
+        const auto value = literal(parameter, CMPI_boolean);
+        return value ? *value->boolean() : form_.trueByDefault.has(parameter);
+    }
+
+    std::optional<std::uint32_t> number(P parameter) const
+    {
+        const auto value = literal(parameter, CMPI_uint32);
+        return value ? std::optional(static_cast<std::uint32_t>(*value->unsignedInteger()))
+                     : std::nullopt;
+    }
+
+    // An empty list is one, and other than none.
+    std::optional<std::vector<std::string>> texts(P parameter) const
+    {
+        const auto value = get(parameter, "VALUE.ARRAY");
+        if (!value)
+            return std::nullopt;
+        std::vector<std::string> all;
+        for (const Element& each : value->children({"VALUE"}))
+            all.push_back(each.content());
+        return all;
+    }
+
+private:
+    void add(const Element& element)
+    {
+        const std::string_view name = element.attribute("NAME");
+        std::size_t at = 0;
+        while (at < ParameterCount && !equalNames(nameOf(static_cast<P>(at)), name))
+            ++at;
+        const auto parameter = static_cast<P>(at);
+        if (at == ParameterCount ||
+            !(form_.required.has(parameter) || form_.optional.has(parameter)))
+            refuse(std::string(form_.name) + " has no parameter " + quotation(name));
+        if (isGiven_[at])
+            refuse(described(parameter) + " comes twice");
+        isGiven_[at] = true;
+        values_[at] = element.findChild({"VALUE", "VALUE.ARRAY", "VALUE.REFERENCE", "INSTANCENAME",
+            "CLASSNAME", "QUALIFIER.DECLARATION", "CLASS", "INSTANCE", "VALUE.NAMEDINSTANCE"});
+        // Some clients name no class by an empty name.
+        if (values_[at] && values_[at]->is("CLASSNAME") && values_[at]->attribute("NAME").empty())
+            values_[at] = std::nullopt;
+    }
+
+    std::optional<Value> literal(P parameter, CMPIType type) const
+    {
+        const auto value = get(parameter, "VALUE");
+        if (!value)
+            return std::nullopt;
+        const std::string content = value->content();
+        const auto read = readLiteral(Arena::required(), type, content);
+        if (!read)
+            refuse(described(parameter) + ": " + quotation(content) + " is no value of type " +
+                   nameOfType(type));
+        return read;
+    }
+
+    const OperationForm& form_;
+    std::array<bool, ParameterCount> isGiven_{};
+    std::array<std::optional<Element>, ParameterCount> values_;
+};
+
+class OperationReader {
+public:
+    OperationReader(const Repository& classes, const Parameters& parameters, Operation& operation)
+        : classes_(classes), parameters_(parameters), paths_(classes), instances_(classes),
+          operation_(operation)
+    {
+    }
+
+    void read()
+    {
+        readFlags();
+        readTexts();
+        readClasses();
+        readPath();
+        readInstances();
+        if (operation_.kind == OperationKind::setProperty)
+            readNewValue();
+    }
+
+private:
+    void readFlags()
+    {
+        operation_.deepInheritance = parameters_.flag(P::deepInheritance);
+        operation_.selection.localOnly = parameters_.flag(P::localOnly);
+        operation_.selection.includeQualifiers = parameters_.flag(P::includeQualifiers);
+        operation_.selection.includeClassOrigin = parameters_.flag(P::includeClassOrigin);
+        operation_.continueOnError = parameters_.flag(P::continueOnError);
+        operation_.operationTimeout = parameters_.number(P::operationTimeout);
+        operation_.maxObjectCount = parameters_.number(P::maxObjectCount).value_or(0);
+        operation_.selection.properties = parameters_.texts(P::propertyList);
+    }
+
+    void readTexts()
+    {
+        operation_.role = parameters_.text(P::role);
+        operation_.resultRole = parameters_.text(P::resultRole);
+        operation_.propertyName = parameters_.text(P::propertyName);
+        operation_.qualifierName = parameters_.text(P::qualifierName);
+        const bool isFilter = !parameters_[P::query];
+        operation_.query = parameters_.text(isFilter ? P::filterQuery : P::query);
+        operation_.queryLanguage =
+            parameters_.text(isFilter ? P::filterQueryLanguage : P::queryLanguage);
+        operation_.enumerationContext = parameters_.text(P::enumerationContext);
+    }
+
+    std::string className(P parameter) const
+    {
+        const auto value = parameters_.get(parameter, "CLASSNAME");
+        return value ? paths_.className(*value, operation_.nameSpace) : std::string();
+    }
+
+    void readClasses()
+    {
+        operation_.className = className(P::className);
+        operation_.associationClass = className(P::assocClass);
+        operation_.resultClass = className(P::resultClass);
+    }
+
+    void readPath()
+    {
+        const std::optional<Element>& object = parameters_[P::objectName];
+        if (object && object->is("CLASSNAME")) {
+            operation_.className = className(P::objectName);
+            return;
+        }
+        const auto name = parameters_.get(object ? P::objectName : P::instanceName, "INSTANCENAME");
+        if (name)
+            setPath(*name);
+    }
+
+    void setPath(const Element& instanceName)
+    {
+        operation_.path = &paths_.instanceName(instanceName, operation_.nameSpace);
+        operation_.className = operation_.path->className();
+    }
+
+    void readInstances()
+    {
+        if (const auto created = parameters_.get(P::newInstance, "INSTANCE")) {
+            operation_.instance = &instances_.instance(*created, operation_.nameSpace);
+            operation_.className = operation_.instance->className();
+        }
+        const auto modified = parameters_.get(P::modifiedInstance, "VALUE.NAMEDINSTANCE");
+        if (!modified)
+            return;
+        const std::vector<Element> parts = modified->children({"INSTANCENAME", "INSTANCE"});
+        if (parts.size() != 2 || !parts[0].is("INSTANCENAME") || !parts[1].is("INSTANCE"))
+            modified->fail("it must hold an INSTANCENAME and an INSTANCE");
+        setPath(parts[0]);
+        if (!equalNames(operation_.className, parts[1].attribute("CLASSNAME")))
+            refuse(described(P::modifiedInstance) + " is of another class than its path");
+        operation_.instance = &instances_.instance(parts[1], operation_.nameSpace, operation_.path);
+    }
+
+    void readNewValue()
+    {
+        const ClassDeclaration* const declared =
+            classes_.findClass(operation_.nameSpace, operation_.className);
+        const PropertyDeclaration* const property =
+            declared == nullptr ? nullptr : declared->property(operation_.propertyName);
+        // A class or property that is not known is found out before the value matters.
+        if (property != nullptr)
+            operation_.newValue = instances_.value(parameters_[P::newValue], property->type,
+                described(P::newValue), operation_.nameSpace);
+    }
+
+    const Repository& classes_;
+    const Parameters& parameters_;
+    PathReader paths_;
+    InstanceReader instances_;
+    Operation& operation_;
+};
+
+// Nothing is known of the arguments' types, so only the target is read.
+void readMethodCall(const Element& call, const Repository& classes, Operation& operation)
+{
+    const PathReader paths(classes);
+    const auto target = pathOf(call).children({"LOCALNAMESPACEPATH", "INSTANCENAME", "CLASSNAME"});
+    for (const Element& part : target) {
+        if (part.is("CLASSNAME")) {
+            operation.className = paths.className(part, operation.nameSpace);
+        } else if (part.is("INSTANCENAME")) {
+            operation.path = &paths.instanceName(part, operation.nameSpace);
+            operation.className = operation.path->className();
+        }
+    }
+    if (operation.className.empty())
+        pathOf(call).fail("it names no class");
+}
+
+} // namespace
+
+Operation readOperation(const Message& message, const Repository& classes)
+{
+    const Element call = callOf(message.document());
+    const OperationForm* const form =
+        message.isIntrinsic() ? findOperation(message.methodName()) : nullptr;
+    if (message.isIntrinsic() && form == nullptr)
+        throw Refusal(CMPI_RC_ERR_NOT_SUPPORTED,
+            "operation " + quotation(message.methodName()) + " is not offered");
+    const Namespace* const nameSpace = classes.findNamespace(message.nameSpace());
+    if (nameSpace == nullptr)
+        throw Refusal(CMPI_RC_ERR_INVALID_NAMESPACE,
+            "there is no namespace " + quotation(message.nameSpace()));
+    Operation operation;
+    operation.nameSpace = nameSpace->name();
+    if (form == nullptr) {
+        operation.kind = OperationKind::invokeMethod;
+        operation.methodName = message.methodName();
+        readMethodCall(call, classes, operation);
+        return operation;
+    }
+    operation.kind = form->kind;
+    OperationReader(classes, Parameters(*form, call), operation).read();
+    return operation;
+}
+
+} // namespace Host::CimXml

@@ -1,0 +1,50 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// Object paths in a request.
+
+#pragma once
+
+#include "host/broker/ObjectPath.h"
+#include "host/broker/Value.h"
+#include "host/cimxml/Element.h"
+#include "host/repository/Repository.h"
+
+#include <string_view>
+
+namespace Host::CimXml {
+
+// Names of namespaces, classes and keys come out as they are declared, and keys are of the types
+// the class declares. Where the class is not known the client's spelling stays, and VALUETYPE or
+// TYPE say what a key is; without either it is a string.
+//
+// Paths live in the arena of this thread's request. All functions throw RequestError for
+// elements that lack something, and Refusal: CMPI_RC_ERR_INVALID_PARAMETER with the key's name
+// for a key that the class does not have, that comes twice or whose value does not fit;
+// CMPI_RC_ERR_INVALID_CLASS for a key without name where the class is not known.
+class PathReader {
+public:
+    explicit PathReader(const Repository& classes) : classes_(classes) {}
+
+    // An INSTANCENAME of the namespace.
+    const ObjectPath& instanceName(const Element& element, std::string_view nameSpace) const;
+    // A VALUE.REFERENCE. What it holds is of the namespace unless it names another.
+    const ObjectPath& reference(const Element& element, std::string_view nameSpace) const;
+    // The class of a CLASSNAME, as it is declared.
+    std::string className(const Element& element, std::string_view nameSpace) const;
+
+private:
+    const ClassDeclaration* declaredClass(const ObjectPath& path) const;
+    std::string_view declaredNameSpace(std::string_view nameSpace) const;
+    ObjectPath& emptyPath(
+        const Element& named, const char* attribute, std::string_view nameSpace) const;
+    ObjectPath& instance(const Element& element, std::string_view nameSpace, unsigned depth) const;
+    ObjectPath& target(const Element& element, std::string_view nameSpace, unsigned depth) const;
+    void addKey(
+        ObjectPath& path, const std::string& name, const Element& element, unsigned depth) const;
+    Value keyValue(
+        const Element& element, const std::string& what, const PropertyDeclaration* declared) const;
+
+    const Repository& classes_;
+};
+
+} // namespace Host::CimXml

@@ -1,0 +1,116 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "host/cimxml/QualifierWriter.h"
+
+#include "host/broker/Types.h"
+#include "host/broker/Value.h"
+#include "host/cimxml/Literal.h"
+
+#include <array>
+#include <utility>
+
+namespace Host::CimXml {
+
+namespace {
+
+constexpr std::array<std::pair<Scope, const char*>, 7> ScopeAttributes = {{
+    {Scope::classes, "CLASS"},
+    {Scope::association, "ASSOCIATION"},
+    {Scope::reference, "REFERENCE"},
+    {Scope::property, "PROPERTY"},
+    {Scope::method, "METHOD"},
+    {Scope::parameter, "PARAMETER"},
+    {Scope::indication, "INDICATION"},
+}};
+
+std::string textOf(const Scalar& value, CMPIType type)
+{
+    if (const auto* const text = std::get_if<std::string>(&value))
+        return *text;
+    if (const auto* const truth = std::get_if<bool>(&value))
+        return writeLiteral(Value::boolean(*truth));
+    if (const auto* const number = std::get_if<std::int64_t>(&value))
+        return std::to_string(*number);
+    if (const auto* const number = std::get_if<std::uint64_t>(&value))
+        return writeLiteral(Value::integer(type, *number));
+    return writeLiteral(Value::real(type, std::get<double>(value)));
+}
+
+void writeFlavor(Markup& element, const Flavor& flavor)
+{
+    if (!flavor.isOverridable)
+        element.attribute("OVERRIDABLE", "false");
+    if (!flavor.isInherited)
+        element.attribute("TOSUBCLASS", "false");
+    if (flavor.isTranslatable)
+        element.attribute("TRANSLATABLE", "true");
+}
+
+void writeScopes(std::string& out, const ScopeSet& scopes)
+{
+    Markup element(out, "SCOPE");
+    for (const auto& [scope, name] : ScopeAttributes)
+        if (scopes.has(scope))
+            element.attribute(name, "true");
+}
+
+} // namespace
+
+std::string_view elementNameFor(CMPIType propertyType)
+{
+    if (isArrayType(propertyType))
+        return "PROPERTY.ARRAY";
+    return propertyType == CMPI_ref ? "PROPERTY.REFERENCE" : "PROPERTY";
+}
+
+void writeEmbeddedObject(Markup& element, const QualifierList& qualifiers)
+{
+    if (!qualifierText(qualifiers, "EmbeddedInstance").empty())
+        element.attribute("EmbeddedObject", "instance");
+    else if (isQualified(qualifiers, "EmbeddedObject"))
+        element.attribute("EmbeddedObject", "object");
+}
+
+void writeConstant(std::string& out, const Constant& value, CMPIType type)
+{
+    if (isNull(value))
+        return;
+    if (const Scalar* const scalar = std::get_if<Scalar>(&value)) {
+        Markup(out, "VALUE").content(textOf(*scalar, type));
+        return;
+    }
+    const Markup element(out, "VALUE.ARRAY");
+    for (const Scalar& each : std::get<std::vector<Scalar>>(value))
+        if (!isNull(each))
+            Markup(out, "VALUE").content(textOf(each, elementType(type)));
+}
+
+void writeQualifiers(
+    std::string& out, const QualifierList& qualifiers, const PropertySelection& selection)
+{
+    for (const Qualifier& qualifier : qualifiers) {
+        if (!isSelected(selection, qualifier))
+            continue;
+        const CMPIType type = qualifier.declaration->type;
+        Markup element(out, "QUALIFIER");
+        element.attribute("NAME", qualifier.name()).attribute("TYPE", nameOf(type));
+        if (qualifier.isPropagated)
+            element.attribute("PROPAGATED", "true");
+        writeFlavor(element, qualifier.flavor);
+        writeConstant(out, *qualifier.value, type);
+    }
+}
+
+void writeQualifierDeclaration(std::string& out, const QualifierDeclaration& declared)
+{
+    Markup element(out, "QUALIFIER.DECLARATION");
+    element.attribute("NAME", declared.name).attribute("TYPE", nameOf(declared.type));
+    element.attribute("ISARRAY", isArrayType(declared.type) ? "true" : "false");
+    if (declared.arraySize)
+        element.attribute("ARRAYSIZE", std::to_string(*declared.arraySize));
+    writeFlavor(element, declared.flavor);
+    writeScopes(out, declared.scopes);
+    writeConstant(out, declared.defaultValue, declared.type);
+}
+
+} // namespace Host::CimXml

@@ -1,0 +1,22 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// What a text must be before it is taken apart as XML.
+
+#pragma once
+
+#include <cstddef>
+#include <string_view>
+
+namespace Host::CimXml {
+
+inline constexpr std::size_t MaximumDepth = 64;
+inline constexpr std::size_t MaximumElements = 100'000;
+inline constexpr std::size_t MaximumAttributes = 16; // of one element
+
+// Well-formed XML in UTF-8 within those bounds, without document type declaration; so the only
+// entities are the five predefined ones, and nothing can expand. Takes time in proportion to the
+// text. Throws RequestError: requestNotWellFormed, or requestNotValid for a document type and
+// beyond the bounds.
+void requireWellFormed(std::string_view text);
+
+} // namespace Host::CimXml

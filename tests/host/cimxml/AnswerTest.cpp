@@ -1,0 +1,335 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// Answers, piece by piece.
+
+#include "host/broker/Array.h"
+#include "host/broker/Instance.h"
+#include "host/cimxml/InstanceWriter.h"
+#include "tests/host/cimxml/CimXmlTest.h"
+
+#include <limits>
+
+namespace CimXmlTests {
+
+namespace {
+
+using Host::Value;
+using Host::CimXml::AnswerWriter;
+using Host::CimXml::OperationKind;
+using testing::HasSubstr;
+
+const std::string Head = R"(<?xml version="1.0" encoding="utf-8"?>)"
+                         "\n"
+                         R"(<CIM CIMVERSION="2.0" DTDVERSION="2.0"><MESSAGE ID="4711" )"
+                         R"(PROTOCOLVERSION="1.0"><SIMPLERSP><IMETHODRESPONSE NAME=")";
+const std::string Tail = "</IMETHODRESPONSE></SIMPLERSP></MESSAGE></CIM>\n";
+const std::string NameXml =
+    R"(<INSTANCENAME CLASSNAME="Thing"><KEYBINDING NAME="Name"><KEYVALUE VALUETYPE="string">a)"
+    R"(</KEYVALUE></KEYBINDING><KEYBINDING NAME="Index"><KEYVALUE VALUETYPE="numeric">7)"
+    R"(</KEYVALUE></KEYBINDING></INSTANCENAME>)";
+const std::string InstanceXml =
+    R"(<INSTANCE CLASSNAME="Thing"><PROPERTY NAME="Name" TYPE="string"><VALUE>a</VALUE></PROPERTY>)"
+    R"(<PROPERTY NAME="Index" TYPE="uint16"><VALUE>7</VALUE></PROPERTY></INSTANCE>)";
+const std::string NameSpaceXml =
+    R"(<NAMESPACEPATH><HOST>box</HOST><LOCALNAMESPACEPATH><NAMESPACE NAME="root"></NAMESPACE>)"
+    R"(<NAMESPACE NAME="test"></NAMESPACE></LOCALNAMESPACEPATH></NAMESPACEPATH>)";
+const std::string PathXml = "<INSTANCEPATH>" + NameSpaceXml + NameXml + "</INSTANCEPATH>";
+
+class AnswerTest : public CimXmlTest {
+protected:
+    AnswerWriter writer(const std::string& name, OperationKind kind)
+    {
+        pieces.clear();
+        return {Message(call(name)), kind, *repository, {"box", Testing::NameSpace}, {},
+            [this](std::string_view piece) { pieces.emplace_back(piece); }};
+    }
+    const std::string& answer()
+    {
+        whole.clear();
+        for (const std::string& piece : pieces)
+            whole += piece;
+        return whole;
+    }
+    // What stands in the IRETURNVALUE.
+    std::string result()
+    {
+        const std::string& all = answer();
+        const auto begin = all.find("<IRETURNVALUE>") + 14;
+        return all.substr(begin, all.find("</IRETURNVALUE>") - begin);
+    }
+    std::string instanceBy(OperationKind kind)
+    {
+        auto out = writer("X", kind);
+        out.instance(instance());
+        out.finish();
+        return result();
+    }
+    std::string pathBy(OperationKind kind)
+    {
+        auto out = writer("X", kind);
+        out.path(path());
+        out.finish();
+        return result();
+    }
+    std::string classNameBy(OperationKind kind)
+    {
+        auto out = writer("X", kind);
+        out.className("Thing");
+        out.finish();
+        return result();
+    }
+
+    Host::Instance& emptyInstance(const char* className = "Thing")
+    {
+        return request.makeInstance(request.makePath(Testing::NameSpace, className));
+    }
+    Host::ObjectPath& path()
+    {
+        Host::ObjectPath& made = request.makePath(Testing::NameSpace, "Thing");
+        made.addKey("Name", Value::text(request.arena(), "a"));
+        made.addKey("Index", Value::integer(CMPI_uint16, 7));
+        return made;
+    }
+    Host::Instance& instance()
+    {
+        broker.setClassInformation(repository);
+        Host::Instance& made = emptyInstance();
+        made.setProperty("Name", Value::text(request.arena(), "a"));
+        made.setProperty("Index", Value::integer(CMPI_uint16, 7));
+        return made;
+    }
+    static std::string valueXml(const Value& value)
+    {
+        std::string out;
+        Host::CimXml::writeValue(out, value);
+        return out;
+    }
+    std::string textXml(std::string_view text)
+    {
+        return valueXml(Value::text(request.arena(), text));
+    }
+    static std::string instanceXml(const Host::Instance& instance,
+        const Host::ClassDeclaration* declared = nullptr,
+        const Host::CimXml::PropertySelection& selection = {})
+    {
+        std::string out;
+        writeInstance(out, instance, declared, selection);
+        return out;
+    }
+
+    std::vector<std::string> pieces;
+    std::string whole;
+};
+
+TEST_F(AnswerTest, wrapsInstancesAsTheOperationDoes)
+{
+    EXPECT_EQ(instanceBy(OperationKind::getInstance), InstanceXml);
+    EXPECT_EQ(instanceBy(OperationKind::enumerateInstances),
+        "<VALUE.NAMEDINSTANCE>" + NameXml + InstanceXml + "</VALUE.NAMEDINSTANCE>");
+    for (const auto kind : {OperationKind::associators, OperationKind::references})
+        EXPECT_EQ(instanceBy(kind),
+            "<VALUE.OBJECTWITHPATH>" + PathXml + InstanceXml + "</VALUE.OBJECTWITHPATH>");
+    for (const auto kind :
+        {OperationKind::openEnumerateInstances, OperationKind::pullInstancesWithPath})
+        EXPECT_EQ(instanceBy(kind),
+            "<VALUE.INSTANCEWITHPATH>" + PathXml + InstanceXml + "</VALUE.INSTANCEWITHPATH>");
+}
+
+TEST_F(AnswerTest, wrapsPathsAndClassNamesAsTheOperationDoes)
+{
+    EXPECT_EQ(pathBy(OperationKind::enumerateInstanceNames), NameXml);
+    EXPECT_EQ(pathBy(OperationKind::createInstance), NameXml);
+    EXPECT_EQ(pathBy(OperationKind::associatorNames), "<OBJECTPATH>" + PathXml + "</OBJECTPATH>");
+    EXPECT_EQ(pathBy(OperationKind::referenceNames), "<OBJECTPATH>" + PathXml + "</OBJECTPATH>");
+    EXPECT_EQ(pathBy(OperationKind::pullInstancePaths), PathXml);
+    const std::string name = "<CLASSNAME NAME=\"Thing\"></CLASSNAME>";
+    EXPECT_EQ(classNameBy(OperationKind::enumerateClassNames), name);
+    EXPECT_EQ(classNameBy(OperationKind::associatorNames),
+        "<OBJECTPATH><CLASSPATH>" + NameSpaceXml + name + "</CLASSPATH></OBJECTPATH>");
+}
+
+TEST_F(AnswerTest, writesClassesAndQualifiers)
+{
+    auto out = writer("EnumerateClasses", OperationKind::enumerateClasses);
+    out.classDeclaration(Testing::classNamed(*repository, "Single"));
+    out.finish();
+    const std::string declared =
+        R"(<CLASS NAME="Single"><PROPERTY NAME="InstanceID" TYPE="string"></PROPERTY></CLASS>)";
+    EXPECT_EQ(result(), declared);
+    auto associated = writer("Associators", OperationKind::associators);
+    associated.classDeclaration(Testing::classNamed(*repository, "Single"));
+    associated.finish();
+    EXPECT_EQ(result(), "<VALUE.OBJECTWITHPATH><CLASSPATH>" + NameSpaceXml +
+                            "<CLASSNAME NAME=\"Single\"></CLASSNAME></CLASSPATH>" + declared +
+                            "</VALUE.OBJECTWITHPATH>");
+    auto qualifiers = writer("GetQualifier", OperationKind::getQualifier);
+    qualifiers.qualifierDeclaration(*repository->findQualifier(Testing::NameSpace, "Key"));
+    qualifiers.finish();
+    EXPECT_THAT(result(), testing::StartsWith("<QUALIFIER.DECLARATION NAME=\"Key\""));
+}
+
+TEST_F(AnswerTest, goesOutInPieces)
+{
+    auto out = writer("EnumerateInstanceNames", OperationKind::enumerateInstanceNames);
+    EXPECT_FALSE(out.hasBegun());
+    out.path(path());
+    EXPECT_TRUE(out.hasBegun());
+    out.path(path());
+    out.finish();
+    EXPECT_THAT(
+        pieces, testing::ElementsAre(Head + "EnumerateInstanceNames\"><IRETURNVALUE>" + NameXml,
+                    NameXml, "</IRETURNVALUE>" + Tail));
+}
+
+TEST_F(AnswerTest, noPieceGrowsWithTheNumberOfObjects)
+{
+    std::size_t largest = 0;
+    std::size_t sum = 0;
+    AnswerWriter out(Message(call("EnumerateInstances")), OperationKind::enumerateInstances,
+        *repository, {"box", Testing::NameSpace}, {}, [&](std::string_view piece) {
+            largest = std::max(largest, piece.size());
+            sum += piece.size();
+        });
+    const Host::Instance& each = instance();
+    for (int count = 0; count < 60'000; ++count)
+        out.instance(each);
+    out.finish();
+    EXPECT_GT(sum, 20'000'000U);
+    EXPECT_LT(largest, 1000U);
+}
+
+TEST_F(AnswerTest, emptyAnswersHaveNoObjectsOrNoReturnValue)
+{
+    auto none = writer("EnumerateInstances", OperationKind::enumerateInstances);
+    none.finish();
+    EXPECT_EQ(answer(), Head + "EnumerateInstances\"><IRETURNVALUE></IRETURNVALUE>" + Tail);
+    for (const auto kind : {OperationKind::deleteInstance, OperationKind::modifyInstance,
+             OperationKind::setProperty, OperationKind::closeEnumeration}) {
+        auto nothing = writer("DeleteInstance", kind);
+        nothing.finish();
+        EXPECT_EQ(answer(), Head + "DeleteInstance\">" + Tail);
+    }
+}
+
+TEST_F(AnswerTest, saysWhetherASequenceGoesOn)
+{
+    const auto end = [](const std::string& ended, const std::string& context) {
+        return R"(</IRETURNVALUE><PARAMVALUE NAME="EndOfSequence" PARAMTYPE="boolean"><VALUE>)" +
+               ended +
+               R"(</VALUE></PARAMVALUE><PARAMVALUE NAME="EnumerationContext" PARAMTYPE="string">)" +
+               "<VALUE>" + context + "</VALUE></PARAMVALUE>" + Tail;
+    };
+    auto open = writer("OpenEnumerateInstances", OperationKind::openEnumerateInstances);
+    open.finish("c&1");
+    EXPECT_EQ(answer(), Head + "OpenEnumerateInstances\"><IRETURNVALUE>" + end("FALSE", "c&amp;1"));
+    auto last = writer("PullInstancePaths", OperationKind::pullInstancePaths);
+    last.finish(std::nullopt);
+    EXPECT_EQ(answer(), Head + "PullInstancePaths\"><IRETURNVALUE>" + end("TRUE", ""));
+}
+
+TEST_F(AnswerTest, tellsFailuresWithCodeAndText)
+{
+    EXPECT_EQ(errorAnswer(Message(call("GetInstance")), CMPI_RC_ERR_NOT_FOUND, "no \"x\" <here>"),
+        Head + R"(GetInstance"><ERROR CODE="6" DESCRIPTION="no &quot;x&quot; &lt;here&gt;">)" +
+            "</ERROR>" + Tail);
+}
+
+TEST_F(AnswerTest, answersMethodsOfClasses)
+{
+    auto out = writer("Reset", OperationKind::invokeMethod);
+    out.value(Value::integer(CMPI_uint32, 0));
+    out.finish();
+    EXPECT_THAT(answer(), HasSubstr("<METHODRESPONSE NAME=\"Reset\"><RETURNVALUE><VALUE>0</VALUE>"
+                                    "</RETURNVALUE></METHODRESPONSE>"));
+}
+
+TEST_F(AnswerTest, writesValuesOfEveryType)
+{
+    EXPECT_EQ(valueXml(Value::boolean(true)), "<VALUE>TRUE</VALUE>");
+    EXPECT_EQ(valueXml(Value::integer(CMPI_sint8, 0x80)), "<VALUE>-128</VALUE>");
+    EXPECT_EQ(valueXml(Value::integer(CMPI_char16, 0xE9)), "<VALUE>\xC3\xA9</VALUE>");
+    EXPECT_EQ(valueXml(Value::integer(CMPI_char16, 0xD800)), "<VALUE>\xEF\xBF\xBD</VALUE>");
+    EXPECT_EQ(valueXml(Value::real(CMPI_real64, 1)), "<VALUE>1.0</VALUE>");
+    EXPECT_EQ(valueXml(Value::real(CMPI_real64, 1e300)), "<VALUE>1.0e+300</VALUE>");
+    EXPECT_EQ(valueXml(Value::real(CMPI_real32, 0.1)), "<VALUE>0.1</VALUE>");
+    const double infinity = std::numeric_limits<double>::infinity();
+    EXPECT_EQ(valueXml(Value::real(CMPI_real64, -infinity)), "<VALUE>-INF</VALUE>");
+    EXPECT_EQ(valueXml(Value::null(CMPI_string)), "");
+    EXPECT_EQ(textXml(""), "<VALUE></VALUE>");
+}
+
+TEST_F(AnswerTest, writesTextThatEveryClientCanRead)
+{
+    EXPECT_EQ(textXml("<a b='c' d=\"e\">&\t\n"),
+        "<VALUE>&lt;a b=&apos;c&apos; d=&quot;e&quot;&gt;&amp;\t\n</VALUE>");
+    EXPECT_EQ(textXml("\x01\x7F\xEF\xBF\xBF"), "<VALUE>\xEF\xBF\xBD\x7F\xEF\xBF\xBD</VALUE>");
+    EXPECT_EQ(textXml("\xFFz\xC3\xA9"), "<VALUE>\xEF\xBF\xBDz\xC3\xA9</VALUE>");
+    EXPECT_EQ(textXml("\xC0\x80"), "<VALUE>\xEF\xBF\xBD\xEF\xBF\xBD</VALUE>");
+    EXPECT_EQ(textXml("\xF0\x9F\x98\x80"), "<VALUE>\xF0\x9F\x98\x80</VALUE>");
+    EXPECT_EQ(textXml("\xF0\x9F"), "<VALUE>\xEF\xBF\xBD\xEF\xBF\xBD</VALUE>");
+}
+
+TEST_F(AnswerTest, leavesNullsInArraysOut)
+{
+    Host::Array& array = Host::Array::make(request.arena(), CMPI_uint8, 3);
+    array.set(0, Value::integer(CMPI_uint8, 1));
+    array.set(2, Value::integer(CMPI_uint8, 3));
+    Host::Instance& made = emptyInstance();
+    made.setProperty("L", Value::of(array));
+    EXPECT_EQ(instanceXml(made),
+        R"(<INSTANCE CLASSNAME="Thing"><PROPERTY.ARRAY NAME="L" TYPE="uint8"><VALUE.ARRAY>)"
+        R"(<VALUE>1</VALUE><VALUE>3</VALUE></VALUE.ARRAY></PROPERTY.ARRAY></INSTANCE>)");
+}
+
+TEST_F(AnswerTest, takesFromTheClassWhatAValueDoesNotSay)
+{
+    const auto& declared = Testing::classNamed(*repository, "Gauge");
+    Host::Instance& made = emptyInstance("Gauge");
+    made.setProperty("Levels", Value());
+    made.setProperty("Percent", Value::null(CMPI_uint8));
+    Host::CimXml::PropertySelection selection;
+    EXPECT_EQ(instanceXml(made, &declared),
+        R"(<INSTANCE CLASSNAME="Gauge"><PROPERTY.ARRAY NAME="Levels" TYPE="sint32" ARRAYSIZE="3">)"
+        R"(</PROPERTY.ARRAY><PROPERTY NAME="Percent" TYPE="uint8"></PROPERTY></INSTANCE>)");
+    selection.includeClassOrigin = true;
+    selection.properties = {"LEVELS"};
+    EXPECT_EQ(instanceXml(made, &declared, selection),
+        R"(<INSTANCE CLASSNAME="Gauge"><PROPERTY.ARRAY NAME="Levels" TYPE="sint32" ARRAYSIZE="3" )"
+        R"(CLASSORIGIN="Thing" PROPAGATED="true"></PROPERTY.ARRAY></INSTANCE>)");
+}
+
+TEST_F(AnswerTest, writesReferencesWithWhatTheyKnow)
+{
+    Host::Instance& made = emptyInstance("Link");
+    Host::ObjectPath& target = path();
+    made.setProperty("Owner", Value::of(target));
+    const auto& declared = Testing::classNamed(*repository, "Link");
+    const std::string begin = R"(<INSTANCE CLASSNAME="Link"><PROPERTY.REFERENCE NAME="Owner" )"
+                              R"(REFERENCECLASS="Thing"><VALUE.REFERENCE>)";
+    const std::string end = "</VALUE.REFERENCE></PROPERTY.REFERENCE></INSTANCE>";
+    EXPECT_EQ(instanceXml(made, &declared),
+        begin + R"(<LOCALINSTANCEPATH><LOCALNAMESPACEPATH><NAMESPACE NAME="root"></NAMESPACE>)" +
+            R"(<NAMESPACE NAME="test"></NAMESPACE></LOCALNAMESPACEPATH>)" + NameXml +
+            "</LOCALINSTANCEPATH>" + end);
+    target.setHost("box");
+    EXPECT_EQ(instanceXml(made, &declared), begin + PathXml + end);
+    target.setNameSpace(nullptr);
+    EXPECT_EQ(instanceXml(made, &declared), begin + NameXml + end);
+}
+
+TEST_F(AnswerTest, writesEmbeddedInstancesAsText)
+{
+    Host::Instance& inner = emptyInstance("Single");
+    inner.setProperty("InstanceID", Value::text(request.arena(), "<"));
+    Host::Instance& outer = emptyInstance();
+    outer.setProperty("In", Value::of(inner));
+    EXPECT_EQ(instanceXml(outer),
+        R"(<INSTANCE CLASSNAME="Thing"><PROPERTY NAME="In" TYPE="string" EmbeddedObject="instance">)"
+        R"(<VALUE>&lt;INSTANCE CLASSNAME=&quot;Single&quot;&gt;&lt;PROPERTY )"
+        R"(NAME=&quot;InstanceID&quot; TYPE=&quot;string&quot;&gt;&lt;VALUE&gt;&amp;lt;&lt;/VALUE)"
+        R"(&gt;&lt;/PROPERTY&gt;&lt;/INSTANCE&gt;</VALUE></PROPERTY></INSTANCE>)");
+}
+
+} // namespace
+
+} // namespace CimXmlTests

@@ -1,0 +1,203 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// The operations that read, and their parameters.
+
+#include "host/broker/ObjectPath.h"
+#include "tests/host/cimxml/CimXmlTest.h"
+
+namespace CimXmlTests {
+
+namespace {
+
+using Host::CimXml::OperationKind;
+using testing::ElementsAre;
+using testing::IsEmpty;
+using testing::Optional;
+using testing::StartsWith;
+
+class OperationTest : public CimXmlTest {};
+
+const std::string Instance = parameter("InstanceName", thing());
+const std::string Object = parameter("ObjectName", thing());
+const std::string Gauge = classOf("ClassName", "gauge");
+const std::string Filters = valueOf("Role", "Owner") + classOf("ResultClass", "single");
+const std::string MoreFilters = valueOf("ResultRole", "Part") + classOf("AssocClass", "LINK");
+
+TEST_F(OperationTest, takesEveryOperationWithWhatItNeeds)
+{
+    const std::string pull = valueOf("EnumerationContext", "c") + valueOf("MaxObjectCount", "9");
+    const std::vector<std::tuple<std::string, std::string, OperationKind>> operations = {
+        {"GetInstance", Instance, OperationKind::getInstance},
+        {"EnumerateInstances", Gauge, OperationKind::enumerateInstances},
+        {"EnumerateInstanceNames", Gauge, OperationKind::enumerateInstanceNames},
+        {"Associators", Object + Filters + MoreFilters, OperationKind::associators},
+        {"AssociatorNames", Object + Filters + MoreFilters, OperationKind::associatorNames},
+        {"References", Object + Filters, OperationKind::references},
+        {"ReferenceNames", Object + Filters, OperationKind::referenceNames},
+        {"GetClass", Gauge, OperationKind::getClass},
+        {"EnumerateClasses", "", OperationKind::enumerateClasses},
+        {"EnumerateClassNames", Gauge, OperationKind::enumerateClassNames},
+        {"GetProperty", Instance + valueOf("PropertyName", "Label"), OperationKind::getProperty},
+        {"GetQualifier", valueOf("QualifierName", "Key"), OperationKind::getQualifier},
+        {"EnumerateQualifiers", "", OperationKind::enumerateQualifiers},
+        {"OpenEnumerateInstances", Gauge, OperationKind::openEnumerateInstances},
+        {"OpenEnumerateInstancePaths", Gauge, OperationKind::openEnumerateInstancePaths},
+        {"OpenAssociatorInstances", Instance + Filters + MoreFilters,
+            OperationKind::openAssociatorInstances},
+        {"OpenAssociatorInstancePaths", Instance + Filters + MoreFilters,
+            OperationKind::openAssociatorInstancePaths},
+        {"OpenReferenceInstances", Instance + Filters, OperationKind::openReferenceInstances},
+        {"OpenReferenceInstancePaths", Instance + Filters,
+            OperationKind::openReferenceInstancePaths},
+        {"PullInstancesWithPath", pull, OperationKind::pullInstancesWithPath},
+        {"PullInstancePaths", pull, OperationKind::pullInstancePaths},
+        {"CloseEnumeration", valueOf("EnumerationContext", "c"), OperationKind::closeEnumeration},
+    };
+    for (const auto& [name, parameters, kind] : operations) {
+        const Operation operation = read(call(name, parameters));
+        EXPECT_EQ(operation.kind, kind) << name;
+        EXPECT_EQ(operation.nameSpace, "root/test");
+        EXPECT_EQ(refusalOf(call(name, parameters + valueOf("Strange", "1"))),
+            "4 " + name + " has no parameter \"Strange\"");
+        if (parameters != "" && name != "EnumerateClassNames")
+            EXPECT_THAT(refusalOf(call(name)), StartsWith("4 " + name + " needs parameter "));
+    }
+}
+
+TEST_F(OperationTest, defaultsAreThoseOfTheOperation)
+{
+    const auto get = read(call("GetInstance", Instance));
+    EXPECT_TRUE(get.selection.localOnly);
+    EXPECT_FALSE(get.selection.includeQualifiers);
+    EXPECT_EQ(get.selection.properties, std::nullopt);
+    const auto enumerate = read(call("EnumerateInstances", Gauge));
+    EXPECT_TRUE(enumerate.selection.localOnly && enumerate.deepInheritance);
+    const auto classes = read(call("EnumerateClasses"));
+    EXPECT_TRUE(classes.selection.localOnly && classes.selection.includeQualifiers);
+    EXPECT_FALSE(classes.deepInheritance);
+    EXPECT_EQ(classes.className, "");
+    const auto open = read(call("OpenEnumerateInstances", Gauge));
+    EXPECT_TRUE(open.deepInheritance);
+    EXPECT_FALSE(open.selection.localOnly || open.continueOnError);
+    EXPECT_EQ(open.operationTimeout, std::nullopt);
+    EXPECT_EQ(open.maxObjectCount, 0U);
+}
+
+TEST_F(OperationTest, readsFlagsInAnyLetterCase)
+{
+    const auto operation = read(call("getINSTANCE", Instance + valueOf("localonly", "FALSE") +
+                                                        valueOf("IncludeQualifiers", " TRUE ") +
+                                                        valueOf("IncludeClassOrigin", "true")));
+    EXPECT_FALSE(operation.selection.localOnly);
+    EXPECT_TRUE(operation.selection.includeQualifiers);
+    EXPECT_TRUE(operation.selection.includeClassOrigin);
+    EXPECT_EQ(refusalOf(call("GetInstance", Instance + valueOf("LocalOnly", "1"))),
+        "4 parameter LocalOnly: \"1\" is no value of type boolean");
+}
+
+TEST_F(OperationTest, anEmptyPropertyListIsOtherThanNone)
+{
+    const auto listOf = [this](const std::string& list) {
+        return read(call("GetInstance", Instance + list)).selection.properties;
+    };
+    EXPECT_EQ(listOf("<IPARAMVALUE NAME='PropertyList'/>"), std::nullopt);
+    EXPECT_THAT(listOf(parameter("PropertyList", "<VALUE.ARRAY/>")), Optional(IsEmpty()));
+    EXPECT_THAT(listOf(parameter("PropertyList", "\n<VALUE.ARRAY> <VALUE>a</VALUE>"
+                                                 "<VALUE>B</VALUE></VALUE.ARRAY>\n")),
+        Optional(ElementsAre("a", "B")));
+    EXPECT_EQ(refusalOf(call("GetInstance", Instance + valueOf("PropertyList", "a"))),
+        "4 parameter PropertyList must be a VALUE.ARRAY, not a VALUE");
+}
+
+TEST_F(OperationTest, readsAssociationFiltersAsDeclared)
+{
+    const auto operation = read(call("Associators", Object + Filters + MoreFilters));
+    EXPECT_EQ(operation.associationClass, "Link");
+    EXPECT_EQ(operation.resultClass, "Single");
+    EXPECT_EQ(operation.role, "Owner");
+    EXPECT_EQ(operation.resultRole, "Part");
+    EXPECT_EQ(operation.className, "Thing");
+    EXPECT_EQ(operation.path->toText(), "root/test:Thing.Name=\"a\",Index=7");
+    EXPECT_EQ(
+        read(call("AssociatorNames", Object + classOf("AssocClass", ""))).associationClass, "");
+}
+
+TEST_F(OperationTest, takesAClassAsTheSourceOfAssociations)
+{
+    const auto operation = read(call("References", classOf("ObjectName", "GAUGE")));
+    EXPECT_EQ(operation.className, "Gauge");
+    EXPECT_EQ(operation.path, nullptr);
+}
+
+TEST_F(OperationTest, readsWhatEnumerationsAreOpenedWith)
+{
+    const auto operation = read(call("OpenEnumerateInstances",
+        Gauge + valueOf("FilterQuery", "q") + valueOf("FilterQueryLanguage", "DMTF:FQL") +
+            valueOf("OperationTimeout", "30") + valueOf("ContinueOnError", "true") +
+            valueOf("MaxObjectCount", "1000")));
+    EXPECT_EQ(operation.query, "q");
+    EXPECT_EQ(operation.queryLanguage, "DMTF:FQL");
+    EXPECT_EQ(operation.operationTimeout, 30U);
+    EXPECT_TRUE(operation.continueOnError);
+    EXPECT_EQ(operation.maxObjectCount, 1000U);
+    EXPECT_EQ(refusalOf(call("PullInstancePaths",
+                  valueOf("EnumerationContext", "c") + valueOf("MaxObjectCount", "4294967296"))),
+        "4 parameter MaxObjectCount: \"4294967296\" is no value of type uint32");
+}
+
+TEST_F(OperationTest, namesTheParameterThatIsWrong)
+{
+    EXPECT_EQ(refusalOf(call("GetInstance")), "4 GetInstance needs parameter InstanceName");
+    EXPECT_EQ(refusalOf(call("GetInstance", "<IPARAMVALUE NAME='InstanceName'/>")),
+        "4 GetInstance needs parameter InstanceName");
+    EXPECT_EQ(refusalOf(call("GetInstance", Instance + Instance)),
+        "4 parameter InstanceName comes twice");
+    EXPECT_EQ(refusalOf(call("EnumerateInstances", classOf("ClassName", ""))),
+        "4 EnumerateInstances needs parameter ClassName");
+    EXPECT_EQ(refusalOf(call("EnumerateInstances", valueOf("ClassName", "Thing"))),
+        "4 parameter ClassName must be a CLASSNAME, not a VALUE");
+    EXPECT_THAT(
+        refusalOf(call("GetInstance", "<IPARAMVALUE/>")), StartsWith("request-not-loosely-valid "));
+    EXPECT_THAT(refusalOf(call("GetInstance", parameter("InstanceName", thing() + thing()))),
+        StartsWith("request-not-loosely-valid "));
+}
+
+TEST_F(OperationTest, refusesUnknownOperationsAndNamespaces)
+{
+    EXPECT_EQ(refusalOf(call("CreateClass")), "7 operation \"CreateClass\" is not offered");
+    std::string body = call("EnumerateQualifiers");
+    body.replace(body.find("\"test\""), 6, "\"none\"");
+    EXPECT_EQ(refusalOf(body), "3 there is no namespace \"root/none\"");
+}
+
+TEST_F(OperationTest, keepsTheSpellingOfAnUnknownClass)
+{
+    EXPECT_EQ(read(call("GetClass", classOf("ClassName", "Nothing"))).className, "Nothing");
+}
+
+TEST_F(OperationTest, recognisesMethodsOfClasses)
+{
+    const std::string where = "<LOCALNAMESPACEPATH><NAMESPACE NAME='root'/><NAMESPACE NAME='test'/>"
+                              "</LOCALNAMESPACEPATH>";
+    const auto method = [&](const std::string& path) {
+        return withHead("<SIMPLEREQ><METHODCALL NAME='Reset'>" + path +
+                        "<PARAMVALUE NAME='Hard' PARAMTYPE='boolean'><VALUE>TRUE</VALUE>"
+                        "</PARAMVALUE></METHODCALL></SIMPLEREQ>");
+    };
+    const auto onInstance =
+        read(method("<LOCALINSTANCEPATH>" + where + thing() + "</LOCALINSTANCEPATH>"));
+    EXPECT_EQ(onInstance.kind, OperationKind::invokeMethod);
+    EXPECT_EQ(onInstance.methodName, "Reset");
+    EXPECT_EQ(onInstance.path->toText(), "root/test:Thing.Name=\"a\",Index=7");
+    const auto onClass = read(method("<LOCALCLASSPATH>" + where +
+                                     "<CLASSNAME NAME='thing'/>"
+                                     "</LOCALCLASSPATH>"));
+    EXPECT_EQ(onClass.className, "Thing");
+    EXPECT_THAT(refusalOf(method("")), StartsWith("request-not-loosely-valid "));
+    EXPECT_THAT(refusalOf(method("<LOCALCLASSPATH>" + where + "</LOCALCLASSPATH>")),
+        StartsWith("request-not-loosely-valid "));
+}
+
+} // namespace
+
+} // namespace CimXmlTests

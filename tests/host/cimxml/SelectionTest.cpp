@@ -1,0 +1,63 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "host/cimxml/PropertySelection.h"
+
+#include "tests/host/cimxml/CimXmlTest.h"
+
+namespace CimXmlTests {
+
+namespace {
+
+using Host::CimXml::isSelected;
+using Host::CimXml::PropertySelection;
+
+class SelectionTest : public CimXmlTest {
+protected:
+    const Host::ClassDeclaration& gauge = Testing::classNamed(*repository, "Gauge");
+};
+
+TEST_F(SelectionTest, withoutListAllPropertiesAreSelected)
+{
+    EXPECT_TRUE(isSelected({}, &gauge, "Name"));
+    EXPECT_TRUE(isSelected({}, nullptr, "Anything"));
+}
+
+TEST_F(SelectionTest, listsAreReadInAnyLetterCase)
+{
+    PropertySelection selection;
+    selection.properties = {"PERCENT", "name"};
+    EXPECT_TRUE(isSelected(selection, &gauge, "Percent"));
+    EXPECT_TRUE(isSelected(selection, nullptr, "Name"));
+    EXPECT_FALSE(isSelected(selection, &gauge, "Label"));
+    selection.properties->clear();
+    EXPECT_FALSE(isSelected(selection, &gauge, "Percent"));
+}
+
+TEST_F(SelectionTest, localIsWhatTheClassDeclares)
+{
+    PropertySelection selection;
+    selection.localOnly = true;
+    EXPECT_TRUE(isSelected(selection, &gauge, "percent"));
+    EXPECT_TRUE(isSelected(selection, &gauge, "Label")); // overridden
+    EXPECT_FALSE(isSelected(selection, &gauge, "Name"));
+    EXPECT_TRUE(isSelected(selection, &gauge, "Unknown"));
+    EXPECT_TRUE(isSelected(selection, nullptr, "Name"));
+    EXPECT_FALSE(isSelected(selection, gauge, *gauge.method("Reset")));
+    EXPECT_TRUE(isSelected(selection, *gauge.superclass, *gauge.method("Reset")));
+}
+
+TEST_F(SelectionTest, qualifiersAreSelectedOnRequest)
+{
+    const auto& inherited = *findQualifier(gauge.qualifiers, "Description");
+    ASSERT_TRUE(inherited.isPropagated);
+    PropertySelection selection;
+    EXPECT_FALSE(isSelected(selection, inherited));
+    selection.includeQualifiers = true;
+    EXPECT_TRUE(isSelected(selection, inherited));
+    selection.localOnly = true;
+    EXPECT_FALSE(isSelected(selection, inherited));
+}
+
+} // namespace
+
+} // namespace CimXmlTests
