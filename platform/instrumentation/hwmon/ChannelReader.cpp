@@ -4,6 +4,7 @@
 
 #include <cmath>
 #include <fstream>
+#include <limits>
 
 namespace Vorn::Hwmon {
 
@@ -95,6 +96,14 @@ std::optional<double> valueOf(const Feature& feature, Subfeature type)
     return value;
 }
 
+// NaN when it is there but cannot be read.
+std::optional<double> limitOf(const Feature& feature, Subfeature type)
+{
+    if (findSubfeature(feature, type) == nullptr)
+        return std::nullopt;
+    return valueOf(feature, type).value_or(std::numeric_limits<double>::quiet_NaN());
+}
+
 bool isSet(const Feature& feature, Subfeature type)
 {
     return valueOf(feature, type).value_or(0.0) != 0.0;
@@ -133,11 +142,11 @@ Channel readChannel(const Feature& feature)
     channel.hasFault = isSet(feature, types.fault);
     channel.isEnabled = enableOf(feature);
     channel.reading = readingOf(feature, types);
-    channel.limits = withoutUnset({.min = valueOf(feature, types.min),
-        .max = valueOf(feature, types.max),
-        .lcrit = valueOf(feature, types.lcrit),
-        .crit = valueOf(feature, types.crit),
-        .emergency = valueOf(feature, types.emergency)});
+    channel.limits = withoutUnset({.min = limitOf(feature, types.min),
+        .max = limitOf(feature, types.max),
+        .lcrit = limitOf(feature, types.lcrit),
+        .crit = limitOf(feature, types.crit),
+        .emergency = limitOf(feature, types.emergency)});
     channel.alarms = {.plain = alarmOf(feature, types.alarm),
         .min = alarmOf(feature, types.minAlarm),
         .max = alarmOf(feature, types.maxAlarm),

@@ -2,6 +2,8 @@
 
 #include "platform/instrumentation/hwmon/Status.h"
 
+#include <cmath>
+
 namespace Vorn::Hwmon {
 
 namespace {
@@ -19,6 +21,11 @@ constexpr unsigned criticalHigh = 26;
 bool isUnset(const std::optional<double>& limit)
 {
     return limit.value_or(0.0) == 0.0;
+}
+
+bool isUnreadable(const std::optional<double>& limit)
+{
+    return limit && std::isnan(*limit);
 }
 
 bool isRaised(const std::optional<bool>& alarm)
@@ -47,6 +54,10 @@ Limits withoutUnset(const Limits& limits)
         set.lcrit = set.crit = std::nullopt;
     if (isUnset(limits.emergency))
         set.emergency = std::nullopt;
+    for (std::optional<double>* const limit :
+        {&set.min, &set.max, &set.lcrit, &set.crit, &set.emergency})
+        if (isUnreadable(*limit))
+            *limit = std::nullopt;
     return set;
 }
 

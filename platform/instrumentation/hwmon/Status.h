@@ -40,7 +40,8 @@ struct Channel {
 // Chips and drivers show 0 for limits that nobody set. A pair of limits (min and max, lcrit and
 // crit) in which no end differs from 0 is therefore taken for absent, and so is an emergency
 // limit of 0; an end that the channel does not have counts as 0. Where one end is set, the other
-// one's 0 is meant: 0 V below a positive maximum.
+// one's 0 is meant: 0 V below a positive maximum. An end that is there but cannot be read, which
+// is NaN here and absent afterwards, may well be set: the other one's 0 stays.
 Limits withoutUnset(const Limits& limits);
 
 // The status code of the node. REQUIRES: the limits are withoutUnset().

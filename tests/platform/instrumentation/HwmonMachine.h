@@ -11,7 +11,9 @@
 #include <filesystem>
 #include <map>
 #include <optional>
+#include <stdexcept>
 #include <string>
+#include <vector>
 
 namespace Testing {
 
@@ -58,6 +60,21 @@ private:
 inline std::string testchip(const std::string& feature)
 {
     return "/hwmon/testchip-isa-0290/" + feature;
+}
+
+// The node of a machine that has no other.
+inline SeenNode only(const std::vector<SeenNode>& nodes)
+{
+    if (nodes.size() != 1)
+        throw std::logic_error("there are " + std::to_string(nodes.size()) + " nodes");
+    return nodes.front();
+}
+
+// The one node of a chip with these attributes.
+inline SeenNode nodeOf(const Attributes& attributes)
+{
+    const OneChip chip(attributes);
+    return only(walk());
 }
 
 } // namespace Testing

@@ -21,7 +21,9 @@ using testing::HasSubstr;
 using Testing::HwmonTest;
 using testing::IsEmpty;
 using Testing::nodeAt;
+using Testing::nodeOf;
 using Testing::OneChip;
+using Testing::only;
 using Testing::SeenNode;
 using testing::SizeIs;
 using Testing::testchip;
@@ -29,20 +31,6 @@ using Testing::walk;
 using Vorn::NodeLexicon::NodeType;
 
 using Hwmon = HwmonTest;
-
-SeenNode only(const std::vector<SeenNode>& nodes)
-{
-    if (nodes.size() != 1)
-        throw std::logic_error("there are " + std::to_string(nodes.size()) + " nodes");
-    return nodes.front();
-}
-
-// The one node of a chip with these attributes.
-SeenNode nodeOf(const Attributes& attributes)
-{
-    const OneChip chip(attributes);
-    return only(walk());
-}
 
 TEST_F(Hwmon, aMachineWithoutTheHwmonClassHasNoSensors)
 {
@@ -102,90 +90,6 @@ TEST_F(Hwmon, theAverageStandsInWhereThereIsNoInput)
     EXPECT_EQ(nodeOf({{"in1_average", "3300"}, {"in1_input", "5000"}}).values.reading, 5.0);
     EXPECT_EQ(
         nodeOf({{"in1_average", "3300"}, {"in1_input", "none"}}).values.reading, std::nullopt);
-}
-
-struct Row {
-    std::string name;
-    Attributes attributes;
-    unsigned status;
-};
-
-class HwmonStatus : public HwmonTest, public testing::WithParamInterface<Row> {};
-
-TEST_P(HwmonStatus, followsFromTheAttributes)
-{
-    EXPECT_EQ(nodeOf(GetParam().attributes).values.status, GetParam().status);
-}
-
-const Row rows[] = {
-    {"normal", {{"temp1_input", "50000"}}, 1},
-    {"temperatureFault", {{"temp1_input", "50000"}, {"temp1_fault", "1"}}, 13},
-    {"fanFault", {{"fan1_input", "0"}, {"fan1_fault", "1"}}, 13},
-    {"noFault", {{"temp1_input", "50000"}, {"temp1_fault", "0"}}, 1},
-    {"unreadable", {{"temp1_input", "N/A"}, {"temp1_crit", "90000"}}, 13},
-    {"notANumber", {{"temp1_input", "nan"}}, 13},
-    {"noInputAtAll", {{"temp1_crit", "90000"}}, 13},
-    {"disabled", {{"temp1_input", "50000"}, {"temp1_enable", "0"}}, 16},
-    {"enabled", {{"temp1_input", "50000"}, {"temp1_enable", "1"}}, 1},
-    {"disabledVoltage", {{"in3_input", "0"}, {"in3_enable", "0"}}, 16},
-    {"disabledFan", {{"fan2_input", "0"}, {"fan2_enable", "0"}}, 16},
-    {"unreadableBeforeDisabled", {{"temp1_input", "N/A"}, {"temp1_enable", "0"}}, 13},
-    {"emergencyAlarm", {{"temp1_input", "50000"}, {"temp1_emergency_alarm", "1"}}, 26},
-    {"critAlarm", {{"temp1_input", "50000"}, {"temp1_crit_alarm", "1"}}, 26},
-    {"voltageCritAlarm", {{"in0_input", "1000"}, {"in0_crit_alarm", "1"}}, 26},
-    {"atCrit", {{"temp1_input", "95000"}, {"temp1_crit", "95000"}}, 26},
-    {"lcritAlarm", {{"temp1_input", "50000"}, {"temp1_lcrit_alarm", "1"}}, 25},
-    {"voltageLcritAlarm", {{"in0_input", "1000"}, {"in0_lcrit_alarm", "1"}}, 25},
-    {"atLcrit", {{"in0_input", "1000"}, {"in0_lcrit", "1000"}, {"in0_crit", "2000"}}, 25},
-    {"maxAlarm", {{"temp1_input", "50000"}, {"temp1_max_alarm", "1"}}, 23},
-    {"fanMaxAlarm", {{"fan1_input", "900"}, {"fan1_max_alarm", "1"}}, 23},
-    {"atMax", {{"in0_input", "2000"}, {"in0_max", "2000"}}, 23},
-    {"minAlarm", {{"temp1_input", "50000"}, {"temp1_min_alarm", "1"}}, 22},
-    {"voltageMinAlarm", {{"in0_input", "1000"}, {"in0_min_alarm", "1"}}, 22},
-    {"atMin", {{"fan1_input", "600"}, {"fan1_min", "600"}}, 22},
-    {"plainAlarm", {{"temp1_input", "50000"}, {"temp1_alarm", "1"}}, 21},
-    {"plainAlarmOfVoltage", {{"in0_input", "1000"}, {"in0_alarm", "1"}}, 21},
-    {"plainAlarmOfAFanBelowItsMinimum",
-        {{"fan1_input", "500"}, {"fan1_min", "600"}, {"fan1_alarm", "1"}}, 22},
-    {"plainAlarmOfAFanAboveItsMinimum",
-        {{"fan1_input", "700"}, {"fan1_min", "600"}, {"fan1_alarm", "1"}}, 21},
-    {"anAlarmThatCannotBeReadIsNotRaised", {{"temp1_input", "50000"}, {"temp1_crit_alarm", "N/A"}},
-        1},
-    {"limitsThatNobodySetAreNotReached",
-        {{"in1_input", "1000"}, {"in1_min", "0"}, {"in1_max", "0"}, {"in1_lcrit", "0"},
-            {"in1_crit", "0"}},
-        1},
-    {"aFanWhoseMinimumNobodySetMayStandStill", {{"fan1_input", "0"}, {"fan1_min", "0"}}, 1},
-};
-
-INSTANTIATE_TEST_SUITE_P(
-    EveryRow, HwmonStatus, testing::ValuesIn(rows), [](const auto& row) { return row.param.name; });
-
-TEST_F(Hwmon, limitsThatNobodySetAreAbsent)
-{
-    const auto values = nodeOf(
-        {{"in1_input", "1000"}, {"in1_min", "0"}, {"in1_max", "0"}, {"in1_lcrit", "0"},
-            {"in1_crit",
-                "0"}}).values;
-    EXPECT_FALSE(values.lowerNonCritical || values.upperNonCritical);
-    EXPECT_FALSE(values.lowerCritical || values.upperCritical);
-    EXPECT_THAT(*values.possibleStates, ElementsAre(1));
-}
-
-TEST_F(Hwmon, aLimitThatCannotBeReadIsAbsent)
-{
-    const auto values =
-        nodeOf({{"temp1_input", "50000"}, {"temp1_max", "N/A"}, {"temp1_crit", "90000"}}).values;
-    EXPECT_FALSE(values.upperNonCritical);
-    EXPECT_EQ(values.upperCritical, 90.0);
-}
-
-TEST_F(Hwmon, aChannelWithAFaultShowsItsLimitsButNoReading)
-{
-    const auto values =
-        nodeOf({{"temp1_input", "-128000"}, {"temp1_fault", "1"}, {"temp1_max", "80000"}}).values;
-    EXPECT_FALSE(values.reading);
-    EXPECT_EQ(values.upperNonCritical, 80.0);
 }
 
 // libsensors opens the attribute at every reading. These are the ways in which that can fail

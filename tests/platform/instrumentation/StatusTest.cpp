@@ -4,6 +4,7 @@
 
 #include <gtest/gtest.h>
 
+#include <limits>
 #include <string>
 
 namespace {
@@ -93,6 +94,25 @@ TEST(UnsetLimits, aZeroBesideASetEndIsMeant)
     EXPECT_EQ(limits.max, 85);
     EXPECT_EQ(limits.lcrit, -40);
     EXPECT_EQ(limits.crit, 0);
+}
+
+TEST(UnsetLimits, aZeroBesideAnEndThatCannotBeReadIsMeant)
+{
+    constexpr double unreadable = std::numeric_limits<double>::quiet_NaN();
+    const Limits limits =
+        withoutUnset({.min = 0, .max = unreadable, .lcrit = unreadable, .crit = 0});
+    EXPECT_EQ(limits.min, 0);
+    EXPECT_FALSE(limits.max || limits.lcrit);
+    EXPECT_EQ(limits.crit, 0);
+}
+
+TEST(UnsetLimits, whatCannotBeReadIsAbsent)
+{
+    constexpr double unreadable = std::numeric_limits<double>::quiet_NaN();
+    const Limits limits =
+        withoutUnset({.min = unreadable, .max = unreadable, .crit = 95, .emergency = unreadable});
+    EXPECT_FALSE(limits.min || limits.max || limits.emergency);
+    EXPECT_EQ(limits.crit, 95);
 }
 
 TEST(UnsetLimits, thePairsDoNotTouchEachOther)
