@@ -22,6 +22,9 @@ class ArenaList {
     };
 
 public:
+    // Stays good when elements are appended, also at the end that it has reached: it keeps where
+    // the list says which chunk it is in, and looks there when it is read. The list must stay
+    // where it is.
     class Iterator {
     public:
         using iterator_category = std::forward_iterator_tag;
@@ -31,12 +34,12 @@ public:
         using reference = const Element&;
 
         Iterator() noexcept = default;
-        reference operator*() const noexcept { return chunk_->elements[index_ % chunkSize]; }
+        reference operator*() const noexcept { return (*chunk_)->elements[index_ % chunkSize]; }
         pointer operator->() const noexcept { return &**this; }
         Iterator& operator++() noexcept
         {
             if (++index_ % chunkSize == 0)
-                chunk_ = chunk_->next;
+                chunk_ = &(*chunk_)->next;
             return *this;
         }
         Iterator operator++(int) noexcept
@@ -49,13 +52,13 @@ public:
 
     private:
         friend class ArenaList;
-        Iterator(const Chunk* chunk, std::size_t index) noexcept : chunk_(chunk), index_(index) {}
-        const Chunk* chunk_ = nullptr;
+        Iterator(Chunk* const* chunk, std::size_t index) noexcept : chunk_(chunk), index_(index) {}
+        Chunk* const* chunk_ = nullptr;
         std::size_t index_ = 0;
     };
 
     std::size_t size() const noexcept { return size_; }
-    Iterator begin() const noexcept { return {first_, 0}; }
+    Iterator begin() const noexcept { return {&first_, 0}; }
     Iterator end() const noexcept { return {nullptr, size_}; }
 
     // Null when the position is out of range.

@@ -18,8 +18,8 @@ public:
     // Empty, of CMPI_ref or CMPI_instance.
     static Enumeration& make(Arena& arena, CMPIType type);
 
-    // The value must live as long as the enumeration's request. To be called before the
-    // enumeration is read.
+    // The value must live as long as the enumeration's request. It comes last, also when all
+    // others have been read.
     void add(const Value& value);
 
     std::size_t size() const noexcept { return elements_.size(); }

@@ -34,6 +34,31 @@ TEST_F(EnumerationTest, GivesItsElementsInOrderAndThenNoMore)
     EXPECT_EQ(rc.rc, CMPI_RC_NO_MORE_ELEMENTS);
 }
 
+// Elements lie in chunks of four: the fourth is where a chunk ends.
+TEST_F(EnumerationTest, WhatIsAddedAtItsEndIsReadNext)
+{
+    for (const std::string before : {"", "A", "ABC", "ABCD", "ABCDE", "ABCDEFGH"}) {
+        Host::Enumeration& grown = Host::Enumeration::make(request.arena(), CMPI_ref);
+        const auto add = [&](const std::string& name) {
+            grown.add(Host::Value::of(request.makePath("root/cimv2", name)));
+        };
+        for (const char name : before)
+            add(std::string(1, name));
+        std::string order;
+        while (CMHasNext(grown.handle(), &rc))
+            order += classOf(CMGetNext(grown.handle(), &rc));
+        EXPECT_EQ(CMGetNext(grown.handle(), nullptr).state, absentState);
+        add("Y");
+        ASSERT_TRUE(CMHasNext(grown.handle(), &rc)) << before;
+        order += classOf(CMGetNext(grown.handle(), &rc));
+        EXPECT_FALSE(CMHasNext(grown.handle(), &rc));
+        add("Z");
+        order += classOf(CMGetNext(grown.handle(), &rc));
+        EXPECT_EQ(order, before + "YZ");
+        EXPECT_EQ(rc.rc, CMPI_RC_OK);
+    }
+}
+
 TEST_F(EnumerationTest, CanBeEmpty)
 {
     CMPIEnumeration* const made = enumeration({});
