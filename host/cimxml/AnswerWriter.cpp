@@ -202,6 +202,7 @@ void AnswerWriter::finish(const std::optional<std::string>& enumerationContext)
 
 void AnswerWriter::begin()
 {
+    piece_.clear(); // of an object that could not be written
     if (hasBegun_)
         return;
     piece_ = head(id_, protocolVersion_, kind_ != OperationKind::invokeMethod, methodName_);

@@ -234,6 +234,27 @@ TEST_F(AnswerTest, tellsFailuresWithCodeAndText)
             "</ERROR>" + Tail);
 }
 
+TEST_F(AnswerTest, writesTheValueOfAProperty)
+{
+    auto out = writer("GetProperty", OperationKind::getProperty);
+    out.value(Value::integer(CMPI_sint32, 5));
+    out.finish();
+    EXPECT_EQ(result(), "<VALUE>5</VALUE>");
+    auto none = writer("GetProperty", OperationKind::getProperty);
+    none.value(Value::null(CMPI_sint32));
+    none.finish();
+    EXPECT_EQ(result(), "");
+}
+
+TEST_F(AnswerTest, repeatsWhatTheRequestSaysEscaped)
+{
+    std::string body = call("Get&lt;Instance");
+    body.replace(body.find("4711"), 4, "&quot;&amp;&#233;");
+    EXPECT_THAT(errorAnswer(Message(body), CMPI_RC_ERR_NOT_SUPPORTED, "x"),
+        testing::AllOf(
+            HasSubstr("ID=\"&quot;&amp;\xC3\xA9\""), HasSubstr("NAME=\"Get&lt;Instance\"")));
+}
+
 TEST_F(AnswerTest, answersMethodsOfClasses)
 {
     auto out = writer("Reset", OperationKind::invokeMethod);
