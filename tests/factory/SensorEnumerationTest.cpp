@@ -96,6 +96,58 @@ TEST_F(SensorEnumerationTest, oneInstanceIsFoundByItsWholeIdentifier)
     EXPECT_EQ(property(*Host::Instance::of(instances_[0]), "ElementName"), "string \"Y\"");
 }
 
+// Harvested one after the other: temperatures come before voltages.
+class DuplicateTest : public SensorEnumerationTest {
+protected:
+    DuplicateTest()
+        : SensorEnumerationTest({{NodeType::Voltage, "/same", "one", NodeReading{}},
+              {NodeType::Temperature, "/same", "one", NodeReading{}}})
+    {
+    }
+};
+
+TEST_F(DuplicateTest, theLaterSensorOfOneIdentifierIsTheOnePublished)
+{
+    EXPECT_EQ(getOne("one:/same"), 0);
+    ASSERT_EQ(instances_.size(), 1U);
+    EXPECT_EQ(property(*Host::Instance::of(instances_[0]), "SensorType"), "uint16 3");
+}
+
+// More sensors than a 16-bit count can say.
+class ManyTest : public SensorEnumerationTest {
+protected:
+    explicit ManyTest(std::size_t count = 65537) : SensorEnumerationTest(nodes(count)) {}
+
+    // The first one harvested is not the first in the order of identifiers.
+    static std::vector<ScriptedNode> nodes(std::size_t count)
+    {
+        std::vector<ScriptedNode> made;
+        for (std::size_t i = 0; i < count; ++i)
+            made.push_back({NodeType::Temperature, "/" + std::to_string(count - i), "many", {}});
+        return made;
+    }
+};
+
+TEST_F(ManyTest, asManyAreServedAsTheirCountCutTo16BitsSaysFromTheFirstHarvested)
+{
+    EXPECT_EQ(factory_.getNumberOfInstances(), 1);
+    EXPECT_EQ(factory_.getAllSensorCMPIObjPaths(broker(), path("C").handle(), paths_, &rc_), 0);
+    ASSERT_EQ(paths_.size(), 1U);
+    EXPECT_EQ(Host::ObjectPath::of(paths_[0])->key("DeviceID")->text(), "many:/65537");
+}
+
+class FullCountTest : public ManyTest {
+protected:
+    FullCountTest() : ManyTest(65536) {}
+};
+
+TEST_F(FullCountTest, exactlyAFull16BitCountOfSensorsIsNone)
+{
+    EXPECT_EQ(factory_.getNumberOfInstances(), 0);
+    EXPECT_EQ(factory_.getAllSensorCMPIObjPaths(broker(), path("C").handle(), paths_, &rc_), 1);
+    EXPECT_TRUE(paths_.empty());
+}
+
 TEST_F(SensorEnumerationTest, anIdentifierIsNeitherFoldedNorTrimmed)
 {
     for (const char* const other : {"y:/p", "Y:/P", " Y:/p", "Y:/p ", "Y:/", "Y:/p2", ""})
@@ -139,6 +191,14 @@ TEST_F(EmptyMachineTest, hasNoObjectPathsAndSaysSoToTheBroker)
     EXPECT_EQ(rc_.rc, CMPI_RC_OK);
     EXPECT_THAT(messages_,
         ElementsAre(BrokerMessage{1, "SensorProfileProvider", "***No instance found***"}));
+}
+
+TEST_F(EmptyMachineTest, leavesAStatusThatWasSetAsItIs)
+{
+    rc_ = {CMPI_RC_ERR_ACCESS_DENIED, nullptr};
+    EXPECT_EQ(factory_.getAllSensorCMPIObjPaths(broker(), path("C").handle(), paths_, &rc_), 1);
+    EXPECT_EQ(rc_.rc, CMPI_RC_ERR_ACCESS_DENIED);
+    EXPECT_EQ(rc_.msg, nullptr);
 }
 
 // ---- Trace lines; those of the instances made on the way are left out ----

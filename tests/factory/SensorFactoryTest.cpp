@@ -6,6 +6,7 @@
 
 #include "tests/support/LogCapture.h"
 #include "tests/support/ProviderTest.h"
+#include "tests/support/WatchedMachine.h"
 
 #include <gmock/gmock.h>
 
@@ -101,6 +102,17 @@ TEST(SensorFactoryTrace, theRequestConstructorTracesItsFlagsAndItsMaps)
             "4000 SensorFactory EXITING: _createEnabledLogicalElementCapMap() in SensorFactory",
             "3000 SensorFactory EXITING: SensorFactory() in SensorFactory,Parameters List:  "
             "isSen=1 isCap=1"));
+}
+
+TEST(SensorFactoryTrace, anExceptionThatIsNoStandardOneLeavesTheConstructorWithoutItsExitingLine)
+{
+    const Testing::WatchedMachine machine([] { throw Testing::StrangeException(); });
+    const LogCapture capture;
+    EXPECT_THROW(SensorFactory(true, true), Testing::StrangeException);
+    EXPECT_EQ(machine.cursorsLeft(), 0U);
+    EXPECT_THAT(factoryLines(capture),
+        ElementsAre("3000 SensorFactory ENTERING: SensorFactory() in SensorFactory,Parameters "
+                    "List:  isSen=1 isCap=1"));
 }
 
 TEST(SensorFactoryTrace, aFailedHarvestBuildsNoMap)

@@ -107,10 +107,22 @@ TEST_F(SensorInstanceBuilderTest, aFullSensorHasAllPropertiesInOrder)
     EXPECT_TRUE(messages_.empty());
 }
 
-TEST_F(SensorInstanceBuilderTest, captionAndDescriptionDiffer)
+TEST_F(SensorInstanceBuilderTest, captionAndDescriptionAreEnglishWhereNoLanguageIsSet)
 {
+    const Testing::EnvironmentVariable language("LC_ALL", "C.UTF-8");
     const Host::Instance& instance = make(fullSensor());
-    EXPECT_NE(property(instance, "Caption"), property(instance, "Description"));
+    EXPECT_EQ(property(instance, "Caption"), "string \"Sensor CPU 1 Vcore\"");
+    EXPECT_EQ(property(instance, "Description"),
+        "string \"Numeric sensor CPU 1 Vcore, read from this computer's hardware\"");
+}
+
+TEST_F(SensorInstanceBuilderTest, captionAndDescriptionAreInTheLanguageThatIsSet)
+{
+    const Testing::EnvironmentVariable language("LC_ALL", "de_DE.UTF-8");
+    const Host::Instance& instance = make(fullSensor());
+    EXPECT_EQ(property(instance, "Caption"), "string \"Sensor CPU 1 Vcore\"");
+    EXPECT_EQ(property(instance, "Description"),
+        "string \"Numerischer Sensor CPU 1 Vcore, ausgelesen aus der Hardware dieses Computers\"");
 }
 
 TEST_F(SensorInstanceBuilderTest, anEmptyRecordPublishesItsDefaults)
@@ -227,9 +239,9 @@ TEST_F(SensorInstanceBuilderTest, aLongNameIsCutInCaptionButNotInName)
         name += "ü";
     sensor.setElementName(name);
     const Host::Instance& instance = make(sensor);
-    const std::string caption = property(instance, "Caption");
-    EXPECT_LE(caption.size(), 2 * 511U + 16U);
-    EXPECT_EQ(caption.substr(caption.size() - 3), "ü\"");
+    // 511 characters, of which "Sensor " takes seven.
+    EXPECT_EQ(property(instance, "Caption"),
+        "string \"Sensor " + name.substr(0, 504 * std::string_view("ü").size()) + "\"");
     EXPECT_EQ(property(instance, "Name"), "string \"" + name + "\"");
 }
 
