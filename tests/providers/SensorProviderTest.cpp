@@ -197,7 +197,7 @@ TEST_F(SensorProviderTest, aRefusalHasNoMessageWithoutABroker)
     EXPECT_TRUE(messages_.empty());
 }
 
-TEST_F(SensorProviderTest, withoutADeviceIDTheInstanceOfAnEqualPathIsFound)
+TEST_F(SensorProviderTest, aPathWithoutADeviceIDEqualsThatOfNoInstance)
 {
     // The path of an instance has all four keys, so no path without a device identifier
     // equals one.

@@ -1,0 +1,105 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// Requests whose factory fails to enumerate instances.
+
+#include "tests/providers/Factories.h"
+#include "tests/providers/FailingEnumerations.h"
+#include "tests/providers/RequestTrace.h"
+
+#include <gmock/gmock.h>
+
+namespace {
+
+using ::testing::ElementsAreArray;
+using namespace Testing;
+using Vorn::NodeReading;
+using Vorn::NodeLexicon::NodeType;
+
+const char* const SensorsFailed = "getAllSensorCMPIInstances failed";
+const char* const CapabilitiesFailed = "getAllSensorEnabledLogicalElementCapCMPIInstances failed";
+
+class EnumerationFailureTest : public ProviderTest {
+protected:
+    Lines traceOfEnumeration(CMPIInstanceMI* mi)
+    {
+        const CMPIObjectPath* const ref = path("ANY_Class").handle();
+        return traceOf(
+            [&] { status_ = mi->ft->enumerateInstances(mi, context(), result(), ref, nullptr); });
+    }
+
+    // With a path that does not name the record by its key.
+    Lines traceOfSearch(CMPIInstanceMI* mi)
+    {
+        const CMPIObjectPath* const ref = path("ANY_Class", {{"Other", "x"}}).handle();
+        return traceOf(
+            [&] { status_ = mi->ft->getInstance(mi, context(), result(), ref, nullptr); });
+    }
+
+    // The answer stays open and the status as the factory left it.
+    void expectGivenUp() const
+    {
+        EXPECT_EQ(status_.rc, FailedEnumeration);
+        EXPECT_EQ(status_.msg, nullptr);
+        EXPECT_TRUE(answer_.instances().empty());
+        EXPECT_EQ(answer_.refused(), 0U);
+        EXPECT_FALSE(answer_.isDone());
+        EXPECT_TRUE(messages_.empty());
+    }
+
+    const ScriptedMachine machine_{{{NodeType::Tachometer, "/f", "Fan", NodeReading{}}}};
+    CMPIInstanceMI* sensors_ = SensorProfileProvider_Create_InstanceMI(broker(), nullptr, nullptr);
+    CMPIInstanceMI* capabilities_ =
+        SensorEnabledLogicalElementCapabilitiesProvider_Create_InstanceMI(
+            broker(), nullptr, nullptr);
+    CMPIStatus status_ = {CMPI_RC_OK, nullptr};
+};
+
+HandlerLines sensorHandler(const std::string& request)
+{
+    return {"SensorProfileProvider", "SensorProvider", "Sensor_" + request};
+}
+
+HandlerLines capabilitiesHandler(const std::string& request)
+{
+    const std::string module = "SensorEnabledLogicalElementCapabilitiesProvider";
+    return {module, module, "SensorEnabledLogicalElementCapabilities_" + request};
+}
+
+TEST_F(EnumerationFailureTest, endsAnEnumerationOfSensors)
+{
+    const HandlerLines lines = sensorHandler("EnumInstances");
+    EXPECT_THAT(traceOfEnumeration(sensors_),
+        ElementsAreArray(sequence({lines.entry(136), builtFactory({"_createSensorMap"}), counted(),
+            lines.failure(SensorsFailed, 155), lines.exit(157)})));
+    expectGivenUp();
+}
+
+TEST_F(EnumerationFailureTest, endsTheSearchForASensor)
+{
+    const HandlerLines lines = sensorHandler("GetInstance");
+    EXPECT_THAT(traceOfSearch(sensors_),
+        ElementsAreArray(sequence({lines.entry(192), builtFactory({"_createSensorMap"}), counted(),
+            lines.failure(SensorsFailed, 251), lines.exit(253)})));
+    expectGivenUp();
+}
+
+TEST_F(EnumerationFailureTest, endsAnEnumerationOfCapabilities)
+{
+    const HandlerLines lines = capabilitiesHandler("EnumInstances");
+    EXPECT_THAT(traceOfEnumeration(capabilities_),
+        ElementsAreArray(
+            sequence({lines.entry(137), builtFactory({"_createEnabledLogicalElementCapMap"}),
+                lines.failure(CapabilitiesFailed, 153), lines.exit(155)})));
+    expectGivenUp();
+}
+
+TEST_F(EnumerationFailureTest, endsTheSearchForCapabilities)
+{
+    const HandlerLines lines = capabilitiesHandler("GetInstance");
+    EXPECT_THAT(traceOfSearch(capabilities_),
+        ElementsAreArray(sequence({lines.entry(191), builtFactory({"_createSensorMap"}),
+            lines.failure(CapabilitiesFailed, 243), lines.exit(245)})));
+    expectGivenUp();
+}
+
+} // namespace
