@@ -71,14 +71,15 @@ void enumerateAssociation(benchmark::State& state, const char* className, const 
     const auto create = std::string_view(className) == SystemDevice
                             ? SensorSystemDeviceProvider_Create_InstanceMI
                             : SensorElementCapabilitiesProvider_Create_InstanceMI;
-    handle(create, &systems, className, state, handler);
-    reportPerObject(state, state.range(0) * state.range(1));
+    const std::int64_t objects = state.range(0) * state.range(1);
+    handle(create, &systems, className, objects, state, handler);
+    reportPerObject(state, objects);
 }
 
 void enumerateNames(benchmark::State& state, const char* className)
 {
     enumerateAssociation(state, className, [](auto* mi, auto& request, auto& result, auto& ref) {
-        mi->ft->enumerateInstanceNames(
+        return mi->ft->enumerateInstanceNames(
             mi, request.context().handle(), result.handle(), ref.handle());
     });
 }
@@ -86,7 +87,7 @@ void enumerateNames(benchmark::State& state, const char* className)
 void enumerateInstances(benchmark::State& state, const char* className)
 {
     enumerateAssociation(state, className, [](auto* mi, auto& request, auto& result, auto& ref) {
-        mi->ft->enumerateInstances(
+        return mi->ft->enumerateInstances(
             mi, request.context().handle(), result.handle(), ref.handle(), nullptr);
     });
 }
@@ -102,7 +103,7 @@ void associate(benchmark::State& state, const char* sourceClass, const char* ass
     const auto create = std::string_view(associationClass) == SystemDevice
                             ? SensorSystemDeviceProvider_Create_AssociationMI
                             : SensorElementCapabilitiesProvider_Create_AssociationMI;
-    handle(create, &systems, sourceClass, state, handler);
+    handle(create, &systems, sourceClass, objects, state, handler);
     reportPerObject(state, objects);
 }
 
@@ -110,8 +111,8 @@ void associators(benchmark::State& state, const char* sourceClass, const char* a
 {
     associate(state, sourceClass, associationClass, state.range(0),
         [=](auto* mi, auto& request, auto& result, auto& ref) {
-            mi->ft->associators(mi, request.context().handle(), result.handle(), ref.handle(),
-                associationClass, nullptr, nullptr, nullptr, nullptr);
+            return mi->ft->associators(mi, request.context().handle(), result.handle(),
+                ref.handle(), associationClass, nullptr, nullptr, nullptr, nullptr);
         });
 }
 
@@ -119,8 +120,8 @@ void associatorNames(benchmark::State& state, const char* sourceClass, const cha
 {
     associate(state, sourceClass, associationClass, state.range(0),
         [=](auto* mi, auto& request, auto& result, auto& ref) {
-            mi->ft->associatorNames(mi, request.context().handle(), result.handle(), ref.handle(),
-                associationClass, nullptr, nullptr, nullptr);
+            return mi->ft->associatorNames(mi, request.context().handle(), result.handle(),
+                ref.handle(), associationClass, nullptr, nullptr, nullptr);
         });
 }
 
@@ -128,7 +129,7 @@ void references(benchmark::State& state, const char* sourceClass, const char* as
 {
     associate(state, sourceClass, associationClass, state.range(0),
         [](auto* mi, auto& request, auto& result, auto& ref) {
-            mi->ft->references(mi, request.context().handle(), result.handle(), ref.handle(),
+            return mi->ft->references(mi, request.context().handle(), result.handle(), ref.handle(),
                 nullptr, nullptr, nullptr);
         });
 }
@@ -137,7 +138,7 @@ void referenceNames(benchmark::State& state, const char* sourceClass, const char
 {
     associate(state, sourceClass, associationClass, state.range(0),
         [](auto* mi, auto& request, auto& result, auto& ref) {
-            mi->ft->referenceNames(
+            return mi->ft->referenceNames(
                 mi, request.context().handle(), result.handle(), ref.handle(), nullptr, nullptr);
         });
 }

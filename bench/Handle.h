@@ -26,11 +26,11 @@ inline void reportPerObject(benchmark::State& state, std::int64_t objects)
 }
 
 // On a machine of as many sensors as the first range says. `create` is the provider's factory,
-// `upcalls` (null for none) what it finds behind the broker. The request's end is measured with
-// the request.
+// `upcalls` (null for none) what it finds behind the broker, `objects` the size of the answer:
+// another answer is an error, not a measurement. The request's end is measured with the request.
 template <typename Create, typename Handler>
 void handle(const Create& create, Host::BrokerUpcalls* upcalls, const char* className,
-    benchmark::State& state, const Handler& handler)
+    std::int64_t objects, benchmark::State& state, const Handler& handler)
 {
     const ModelMachine machine(state.range(0));
     Host::Broker broker;
@@ -40,8 +40,13 @@ void handle(const Create& create, Host::BrokerUpcalls* upcalls, const char* clas
         Host::Request request(broker);
         Host::CollectedResult answer;
         Host::Result result(answer);
-        handler(mi, request, result, request.makePath(NameSpace, className));
-        benchmark::DoNotOptimize(answer.isDone());
+        const CMPIStatus status =
+            handler(mi, request, result, request.makePath(NameSpace, className));
+        const auto answered = answer.instances().size() + answer.paths().size();
+        if (status.rc != CMPI_RC_OK || answered != static_cast<std::size_t>(objects)) {
+            state.SkipWithError("the request failed or its answer is not whole");
+            break;
+        }
     }
 }
 

@@ -29,9 +29,9 @@ constexpr const char* Class = "ZUMLO_NumericSensor";
 
 void EnumInstanceNames(benchmark::State& state)
 {
-    handle(SensorProfileProvider_Create_InstanceMI, nullptr, Class, state,
+    handle(SensorProfileProvider_Create_InstanceMI, nullptr, Class, state.range(0), state,
         [](auto* mi, auto& request, auto& result, auto& ref) {
-            mi->ft->enumerateInstanceNames(
+            return mi->ft->enumerateInstanceNames(
                 mi, request.context().handle(), result.handle(), ref.handle());
         });
     reportPerObject(state, state.range(0));
@@ -39,9 +39,9 @@ void EnumInstanceNames(benchmark::State& state)
 
 void EnumInstances(benchmark::State& state)
 {
-    handle(SensorProfileProvider_Create_InstanceMI, nullptr, Class, state,
+    handle(SensorProfileProvider_Create_InstanceMI, nullptr, Class, state.range(0), state,
         [](auto* mi, auto& request, auto& result, auto& ref) {
-            mi->ft->enumerateInstances(
+            return mi->ft->enumerateInstances(
                 mi, request.context().handle(), result.handle(), ref.handle(), nullptr);
         });
     reportPerObject(state, state.range(0));
@@ -50,10 +50,10 @@ void EnumInstances(benchmark::State& state)
 void GetInstance(benchmark::State& state)
 {
     const std::string deviceID = ModelMachine::someDeviceID(state.range(0));
-    handle(SensorProfileProvider_Create_InstanceMI, nullptr, Class, state,
+    handle(SensorProfileProvider_Create_InstanceMI, nullptr, Class, 1, state,
         [&](auto* mi, auto& request, auto& result, auto& ref) {
             ref.addKey("DeviceID", Host::Value::text(request.arena(), deviceID));
-            mi->ft->getInstance(
+            return mi->ft->getInstance(
                 mi, request.context().handle(), result.handle(), ref.handle(), nullptr);
         });
     reportPerObject(state, state.range(0)); // it harvests all of them
