@@ -9,6 +9,7 @@ build_packages=(
   gettext
   libboost-locale-dev libcli11-dev libfmt-dev libsensors-dev libspdlog-dev nlohmann-json3-dev
   libpugixml-dev tao-pegtl-dev
+  libcrypt-dev libgnutls28-dev libmicrohttpd-dev
   nettle-dev pkg-config
 )
 
@@ -17,6 +18,7 @@ check_packages=(
   clang libclang-rt-14-dev
   libgmock-dev libgtest-dev
   binutils lm-sensors locales util-linux
+  openssl sblim-wbemcli
 )
 
 bench_packages=(
