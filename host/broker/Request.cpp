@@ -19,7 +19,7 @@ void addText(Context& context, Arena& arena, const char* name, std::string_view 
 } // namespace
 
 Request::Request(const Broker& broker, const RequestInfo& info)
-    : broker_(broker), own_(Arena::current() == nullptr ? std::make_unique<Arena>() : nullptr),
+    : broker_(broker), own_(Arena::current() == nullptr ? std::make_shared<Arena>() : nullptr),
       arena_(own_ ? *own_ : *Arena::current()), context_(arena_)
 {
     Arena* const before = Arena::makeCurrent(&arena_);

@@ -28,9 +28,9 @@ struct RequestInfo {
     std::string_view contentLanguage{};
 };
 
-// All objects made while it lasts go with it. A request made while another one is active on
-// the thread, as in an up-call, shares the arena of that one: its objects can be handed to
-// the caller and go with the outermost request.
+// All objects made while it lasts go with it, unless somebody holds on to its arena. A request
+// made while another one is active on the thread, as in an up-call, uses the arena of that one:
+// its objects can be handed to the caller and go with the outermost request.
 //
 // Stays on the stack of its thread; the last one made ends first.
 class Request {
@@ -42,6 +42,9 @@ public:
     Request& operator=(const Request&) = delete;
 
     Arena& arena() const noexcept { return arena_; }
+    // For objects that are to outlive the request: they do while somebody holds this. Null for a
+    // request within another one.
+    const std::shared_ptr<Arena>& shareArena() const noexcept { return own_; }
     Context& context() noexcept { return context_; }
 
     // Objects for the provider's arguments.
@@ -50,7 +53,7 @@ public:
 
 private:
     const Broker& broker_;
-    std::unique_ptr<Arena> own_; // of the outermost request
+    std::shared_ptr<Arena> own_; // of the outermost request
     Arena& arena_;
     Context context_;
 };

@@ -1,0 +1,40 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// Operations that follow associations from an instance, or from a class.
+
+#pragma once
+
+#include "host/cimxml/Operation.h"
+#include "host/operations/AnswerObjects.h"
+
+namespace Host {
+
+class Manager;
+class Repository;
+class Request;
+
+// Used from any thread. Each adds what it finds to the answer; they throw Refusal as the manager
+// does. From a class they lead to classes, as the associations declare them.
+class AssociationOperations {
+public:
+    // Both must outlive it.
+    AssociationOperations(const Repository& classes, Manager& manager)
+        : classes_(classes), manager_(manager)
+    {
+    }
+
+    void associators(
+        const CimXml::Operation& operation, Request& request, AnswerObjects& found) const;
+    void associatorNames(
+        const CimXml::Operation& operation, Request& request, AnswerObjects& found) const;
+    void references(
+        const CimXml::Operation& operation, Request& request, AnswerObjects& found) const;
+    void referenceNames(
+        const CimXml::Operation& operation, Request& request, AnswerObjects& found) const;
+
+private:
+    const Repository& classes_;
+    Manager& manager_;
+};
+
+} // namespace Host

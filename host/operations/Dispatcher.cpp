@@ -1,0 +1,145 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "host/operations/Dispatcher.h"
+
+#include "host/broker/Refusal.h"
+#include "host/broker/Request.h"
+#include "host/cimxml/Message.h"
+#include "host/manager/Manager.h"
+#include "host/operations/ClassOperations.h"
+#include "host/operations/Selections.h"
+
+#include <utility>
+
+namespace Host {
+
+using CimXml::Operation;
+using Kind = CimXml::OperationKind;
+
+namespace {
+
+// CMPI has more codes than the protocol, for the talk between providers and brokers.
+CMPIrc statusCode(CMPIrc code)
+{
+    constexpr auto last = CMPI_RC_ERR_QUERY_FEATURE_NOT_SUPPORTED;
+    const bool isOfProtocol = code > CMPI_RC_OK && code <= last && code != CMPI_RC_NO_MORE_ELEMENTS;
+    return isOfProtocol ? code : CMPI_RC_ERR_FAILED;
+}
+
+} // namespace
+
+Dispatcher::Dispatcher(const Repository& classes, Manager& manager, std::string hostName,
+    const OperationLimits& limits, OpenEnumerations::Clock clock)
+    : classes_(classes), manager_(manager), hostName_(std::move(hostName)),
+      instances_(classes, manager), associations_(classes, manager),
+      pulls_(limits, std::move(clock))
+{
+}
+
+std::unique_ptr<CimXml::Answer> Dispatcher::answer(
+    const CimXml::Message& message, const CimXml::Caller& caller)
+{
+    try {
+        return carryOut(message, caller);
+    } catch (const Refusal& refusal) {
+        return std::make_unique<WrittenAnswer>(
+            errorAnswer(message, statusCode(refusal.code()), refusal.what()));
+    }
+}
+
+std::unique_ptr<CimXml::Answer> Dispatcher::carryOut(
+    const CimXml::Message& message, const CimXml::Caller& caller)
+{
+    // What is read lives in the same memory as what is found, but the context can be made only
+    // when the operation is known.
+    const Request reading(manager_.broker());
+    Operation operation = readOperation(message, classes_);
+    operation.selection = effectiveSelection(operation, classes_);
+    Request request(manager_.broker(), {.flags = flagsOf(operation),
+                                           .nameSpace = operation.nameSpace,
+                                           .principal = caller.principal,
+                                           .acceptLanguage = caller.acceptLanguage});
+    AnswerObjects found(reading.shareArena());
+    const auto continuation = run(operation, request, caller.principal, found);
+    return std::make_unique<ObjectAnswer>(message, operation.kind, classes_,
+        CimXml::Location{hostName_, operation.nameSpace}, std::move(operation.selection),
+        std::move(found), continuation);
+}
+
+std::optional<Continuation> Dispatcher::run(
+    Operation& operation, Request& request, const std::string& principal, AnswerObjects& found)
+{
+    if (PullOperations::isOpening(operation.kind)) {
+        pulls_.checkOpening(operation);
+        runToTheEnd(operation, request, found);
+        return pulls_.open(operation, principal, found);
+    }
+    switch (operation.kind) {
+    case Kind::pullInstancesWithPath:
+    case Kind::pullInstancePaths:
+        return pulls_.pull(operation, principal, found);
+    case Kind::closeEnumeration:
+        pulls_.close(operation, principal);
+        return std::nullopt;
+    default:
+        runToTheEnd(operation, request, found);
+        return std::nullopt;
+    }
+}
+
+void Dispatcher::runToTheEnd(const Operation& operation, Request& request, AnswerObjects& found)
+{
+    switch (operation.kind) {
+    case Kind::getInstance:
+        return instances_.get(operation, request, found);
+    case Kind::enumerateInstances:
+    case Kind::openEnumerateInstances:
+        return instances_.enumerate(operation, request, found);
+    case Kind::enumerateInstanceNames:
+    case Kind::openEnumerateInstancePaths:
+        return instances_.enumerateNames(operation, request, found);
+    case Kind::getProperty:
+        return instances_.getProperty(operation, request, found);
+    case Kind::setProperty:
+        return instances_.setProperty(operation, request);
+    case Kind::createInstance:
+        return instances_.create(operation, request, found);
+    case Kind::modifyInstance:
+        return instances_.modify(operation, request);
+    case Kind::deleteInstance:
+        return instances_.remove(operation, request);
+    case Kind::execQuery:
+        return instances_.query(operation, request, found);
+    case Kind::associators:
+    case Kind::openAssociatorInstances:
+        return associations_.associators(operation, request, found);
+    case Kind::associatorNames:
+    case Kind::openAssociatorInstancePaths:
+        return associations_.associatorNames(operation, request, found);
+    case Kind::references:
+    case Kind::openReferenceInstances:
+        return associations_.references(operation, request, found);
+    case Kind::referenceNames:
+    case Kind::openReferenceInstancePaths:
+        return associations_.referenceNames(operation, request, found);
+    case Kind::getClass:
+        return getClass(classes_, operation, found);
+    case Kind::enumerateClasses:
+        return enumerateClasses(classes_, operation, found);
+    case Kind::enumerateClassNames:
+        return enumerateClassNames(classes_, operation, found);
+    case Kind::getQualifier:
+        return getQualifier(classes_, operation, found);
+    case Kind::enumerateQualifiers:
+        return enumerateQualifiers(classes_, operation, found);
+    case Kind::invokeMethod:
+        throw Refusal(CMPI_RC_ERR_NOT_SUPPORTED,
+            "class " + operation.className + " offers no method " + operation.methodName);
+    case Kind::pullInstancesWithPath:
+    case Kind::pullInstancePaths:
+    case Kind::closeEnumeration:
+        break; // of an enumeration that has run already
+    }
+}
+
+} // namespace Host

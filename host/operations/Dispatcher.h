@@ -1,0 +1,46 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// Takes each operation of the protocol to what carries it out.
+
+#pragma once
+
+#include "host/cimxml/OperationHandler.h"
+#include "host/operations/AssociationOperations.h"
+#include "host/operations/InstanceOperations.h"
+#include "host/operations/PullOperations.h"
+
+#include <memory>
+#include <optional>
+#include <string>
+
+namespace Host {
+
+class Dispatcher : public CimXml::OperationHandler {
+public:
+    // The host's name is for paths that do not have one of their own. Classes and manager must
+    // outlive the dispatcher and its answers.
+    Dispatcher(const Repository& classes, Manager& manager, std::string hostName,
+        const OperationLimits& limits = {},
+        OpenEnumerations::Clock clock = std::chrono::steady_clock::now);
+
+    // A failure is answered with the code of the Refusal it ends in; codes that are none of the
+    // protocol's become CIM_ERR_FAILED.
+    std::unique_ptr<CimXml::Answer> answer(
+        const CimXml::Message& message, const CimXml::Caller& caller) override;
+
+private:
+    std::unique_ptr<CimXml::Answer> carryOut(
+        const CimXml::Message& message, const CimXml::Caller& caller);
+    std::optional<Continuation> run(CimXml::Operation& operation, Request& request,
+        const std::string& principal, AnswerObjects& found);
+    void runToTheEnd(const CimXml::Operation& operation, Request& request, AnswerObjects& found);
+
+    const Repository& classes_;
+    Manager& manager_;
+    const std::string hostName_;
+    const InstanceOperations instances_;
+    const AssociationOperations associations_;
+    PullOperations pulls_;
+};
+
+} // namespace Host

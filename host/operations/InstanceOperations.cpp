@@ -1,0 +1,123 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "host/operations/InstanceOperations.h"
+
+#include "host/broker/Instance.h"
+#include "host/broker/Names.h"
+#include "host/broker/ObjectPath.h"
+#include "host/broker/Refusal.h"
+#include "host/broker/Request.h"
+#include "host/manager/Manager.h"
+#include "host/operations/Selections.h"
+#include "host/operations/WholeResult.h"
+#include "host/repository/Repository.h"
+
+#include <sstream>
+
+namespace Host {
+
+using CimXml::Operation;
+
+namespace {
+
+// What stands behind FROM; empty when nothing does. Providers read the rest.
+std::string classOfQuery(const std::string& query)
+{
+    std::istringstream words(query);
+    std::string word;
+    while (words >> word)
+        if (equalNames(word, "FROM") && words >> word)
+            return word;
+    return {};
+}
+
+} // namespace
+
+void InstanceOperations::get(
+    const Operation& operation, Request& request, AnswerObjects& found) const
+{
+    PropertyNames properties(operation.selection.properties);
+    found.add(&manager_.getInstance(request.context(), *operation.path, properties.get()));
+}
+
+void InstanceOperations::enumerate(
+    const Operation& operation, Request& request, AnswerObjects& found) const
+{
+    PropertyNames properties(operation.selection.properties);
+    addWhole(found, [&](ResultSink& sink) {
+        manager_.enumerateInstances(request.context(),
+            request.makePath(operation.nameSpace, operation.className), properties.get(), sink);
+    });
+}
+
+void InstanceOperations::enumerateNames(
+    const Operation& operation, Request& request, AnswerObjects& found) const
+{
+    addWhole(found, [&](ResultSink& sink) {
+        manager_.enumerateInstanceNames(
+            request.context(), request.makePath(operation.nameSpace, operation.className), sink);
+    });
+}
+
+void InstanceOperations::getProperty(
+    const Operation& operation, Request& request, AnswerObjects& found) const
+{
+    checkProperty(operation);
+    PropertyNames properties(std::vector{operation.propertyName});
+    const Instance& instance =
+        manager_.getInstance(request.context(), *operation.path, properties.get());
+    const Value* const value = instance.property(operation.propertyName);
+    found.add(value == nullptr ? Value() : *value);
+}
+
+void InstanceOperations::setProperty(const Operation& operation, Request& request) const
+{
+    checkProperty(operation);
+    Instance& changed = request.makeInstance(*operation.path);
+    changed.setProperty(operation.propertyName, operation.newValue);
+    PropertyNames properties(std::vector{operation.propertyName});
+    manager_.modifyInstance(request.context(), *operation.path, changed, properties.get());
+}
+
+void InstanceOperations::create(
+    const Operation& operation, Request& request, AnswerObjects& found) const
+{
+    found.add(&manager_.createInstance(
+        request.context(), operation.instance->objectPath(), *operation.instance));
+}
+
+void InstanceOperations::modify(const Operation& operation, Request& request) const
+{
+    PropertyNames properties(operation.selection.properties);
+    manager_.modifyInstance(
+        request.context(), *operation.path, *operation.instance, properties.get());
+}
+
+void InstanceOperations::remove(const Operation& operation, Request& request) const
+{
+    manager_.deleteInstance(request.context(), *operation.path);
+}
+
+void InstanceOperations::query(
+    const Operation& operation, Request& request, AnswerObjects& found) const
+{
+    const std::string className = classOfQuery(operation.query);
+    if (className.empty())
+        throw Refusal(CMPI_RC_ERR_INVALID_QUERY, "the query names no class to select from");
+    addWhole(found, [&](ResultSink& sink) {
+        manager_.execQuery(request.context(), request.makePath(operation.nameSpace, className),
+            operation.query.c_str(), operation.queryLanguage.c_str(), sink);
+    });
+}
+
+void InstanceOperations::checkProperty(const Operation& operation) const
+{
+    const ClassDeclaration* const declared =
+        classes_.findClass(operation.nameSpace, operation.className);
+    // The manager complains of a class that is not known.
+    if (declared != nullptr && declared->property(operation.propertyName) == nullptr)
+        throw Refusal(CMPI_RC_ERR_NO_SUCH_PROPERTY,
+            "class " + declared->name + " has no property " + operation.propertyName);
+}
+
+} // namespace Host

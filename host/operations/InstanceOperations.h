@@ -1,0 +1,52 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// Operations on instances and their properties, taken to the manager.
+
+#pragma once
+
+#include "host/cimxml/Operation.h"
+#include "host/operations/AnswerObjects.h"
+
+namespace Host {
+
+class Manager;
+class Repository;
+class Request;
+
+// Used from any thread. Each throws Refusal as the manager does, and adds what it finds to the
+// answer. The operation and its selection are as they are to be carried out.
+class InstanceOperations {
+public:
+    // Both must outlive it.
+    InstanceOperations(const Repository& classes, Manager& manager)
+        : classes_(classes), manager_(manager)
+    {
+    }
+
+    void get(const CimXml::Operation& operation, Request& request, AnswerObjects& found) const;
+    void enumerate(
+        const CimXml::Operation& operation, Request& request, AnswerObjects& found) const;
+    void enumerateNames(
+        const CimXml::Operation& operation, Request& request, AnswerObjects& found) const;
+
+    // Throw Refusal (CMPI_RC_ERR_NO_SUCH_PROPERTY) for one that the class does not have.
+    void getProperty(
+        const CimXml::Operation& operation, Request& request, AnswerObjects& found) const;
+    void setProperty(const CimXml::Operation& operation, Request& request) const;
+
+    void create(const CimXml::Operation& operation, Request& request, AnswerObjects& found) const;
+    void modify(const CimXml::Operation& operation, Request& request) const;
+    void remove(const CimXml::Operation& operation, Request& request) const;
+
+    // Goes to the provider of the class that the query selects from. Throws Refusal
+    // (CMPI_RC_ERR_INVALID_QUERY) when it does not say of which.
+    void query(const CimXml::Operation& operation, Request& request, AnswerObjects& found) const;
+
+private:
+    void checkProperty(const CimXml::Operation& operation) const;
+
+    const Repository& classes_;
+    Manager& manager_;
+};
+
+} // namespace Host

@@ -1,0 +1,117 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "host/operations/InteropObjects.h"
+
+#include "host/broker/Array.h"
+#include "host/broker/Instance.h"
+#include "host/broker/Names.h"
+#include "host/broker/ObjectPath.h"
+#include "host/repository/Repository.h"
+
+namespace Host {
+
+namespace {
+
+constexpr const char* SystemClass = "ZUMLO_ComputerSystem";
+constexpr const char* ObjectManagerName = "sensor-profile";
+
+// The profile of sensors, DSP1009, in the version that the served classes follow.
+constexpr const char* ProfileId = "ZUMLO:DSP1009";
+constexpr const char* ProfileName = "Sensors";
+constexpr const char* ProfileVersion = "1.0.2";
+
+// Codes of the DMTF value maps.
+constexpr unsigned Enabled = 2;        // CIM_EnabledLogicalElement.EnabledState
+constexpr unsigned NotApplicable = 12; // .RequestedState: nobody can request one here
+constexpr unsigned Healthy = 5;        // CIM_ManagedSystemElement.HealthState
+constexpr unsigned Ok = 2;             // .OperationalStatus
+constexpr unsigned Dmtf = 2;           // CIM_RegisteredProfile.RegisteredOrganization
+constexpr unsigned NotAdvertised = 2;  // .AdvertiseTypes
+
+Value code(unsigned number)
+{
+    return Value::integer(CMPI_uint16, number);
+}
+
+} // namespace
+
+InteropObjects::InteropObjects(const Repository& classes, const std::string& hostName)
+    : classes_(classes)
+{
+    addObjectManager(hostName);
+    for (const auto& each : classes.namespaces())
+        addNamespace(hostName, each->name());
+    addProfile();
+}
+
+std::vector<const Instance*> InteropObjects::ofClass(std::string_view className) const
+{
+    std::vector<const Instance*> found;
+    for (const Instance* const object : objects_)
+        if (equalNames(object->className(), className))
+            found.push_back(object);
+    return found;
+}
+
+void InteropObjects::addObjectManager(const std::string& hostName)
+{
+    Instance& manager = add(ObjectManagerClass);
+    setText(manager, "SystemCreationClassName", SystemClass);
+    setText(manager, "SystemName", hostName);
+    setText(manager, "CreationClassName", ObjectManagerClass);
+    setText(manager, "Name", ObjectManagerName);
+    setText(manager, "ElementName", ObjectManagerName);
+    setText(manager, "Caption", "Object Manager");
+    setText(manager, "Description", "The object manager that comes with the sensor provider.");
+    setCodes(manager, "OperationalStatus", Ok);
+    manager.setProperty("HealthState", code(Healthy));
+    manager.setProperty("EnabledState", code(Enabled));
+    manager.setProperty("RequestedState", code(NotApplicable));
+    manager.setProperty("Started", Value::boolean(true));
+    manager.setProperty("GatherStatisticalData", Value::boolean(false));
+}
+
+void InteropObjects::addNamespace(const std::string& hostName, const std::string& name)
+{
+    Instance& nameSpace = add(NamespaceClass);
+    setText(nameSpace, "SystemCreationClassName", SystemClass);
+    setText(nameSpace, "SystemName", hostName);
+    setText(nameSpace, "ObjectManagerCreationClassName", ObjectManagerClass);
+    setText(nameSpace, "ObjectManagerName", ObjectManagerName);
+    setText(nameSpace, "CreationClassName", NamespaceClass);
+    setText(nameSpace, "Name", name);
+    setText(nameSpace, "ElementName", name);
+}
+
+void InteropObjects::addProfile()
+{
+    Instance& profile = add(RegisteredProfileClass);
+    setText(profile, "InstanceID", ProfileId);
+    setText(profile, "ElementName", ProfileName);
+    profile.setProperty("RegisteredOrganization", code(Dmtf));
+    setText(profile, "RegisteredName", ProfileName);
+    setText(profile, "RegisteredVersion", ProfileVersion);
+    setCodes(profile, "AdvertiseTypes", NotAdvertised);
+}
+
+Instance& InteropObjects::add(const char* className)
+{
+    const ObjectPath& path = ObjectPath::make(arena_, InteropNameSpace, className);
+    Instance& made = Instance::make(arena_, path, &classes_);
+    objects_.push_back(&made);
+    return made;
+}
+
+void InteropObjects::setText(Instance& instance, const char* name, std::string_view text)
+{
+    instance.setProperty(name, Value::text(arena_, text));
+}
+
+void InteropObjects::setCodes(Instance& instance, const char* name, unsigned only)
+{
+    Array& codes = Array::make(arena_, CMPI_uint16, 1);
+    codes.set(0, code(only));
+    instance.setProperty(name, Value::of(codes));
+}
+
+} // namespace Host

@@ -1,0 +1,46 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// The objects of root/interop, in which the object manager describes itself to clients that look
+// around: its namespaces, itself and the profile it follows.
+
+#pragma once
+
+#include "host/broker/Arena.h"
+
+#include <string>
+#include <string_view>
+#include <vector>
+
+namespace Host {
+
+class Instance;
+class Repository;
+
+inline constexpr const char* InteropNameSpace = "root/interop";
+inline constexpr const char* NamespaceClass = "CIM_Namespace";
+inline constexpr const char* ObjectManagerClass = "CIM_ObjectManager";
+inline constexpr const char* RegisteredProfileClass = "CIM_RegisteredProfile";
+
+// They never change, and may be read from any thread.
+class InteropObjects {
+public:
+    // The classes must outlive the objects.
+    InteropObjects(const Repository& classes, const std::string& hostName);
+
+    // Live as long as this object.
+    std::vector<const Instance*> ofClass(std::string_view className) const;
+
+private:
+    void addObjectManager(const std::string& hostName);
+    void addNamespace(const std::string& hostName, const std::string& name);
+    void addProfile();
+    Instance& add(const char* className);
+    void setText(Instance& instance, const char* name, std::string_view text);
+    void setCodes(Instance& instance, const char* name, unsigned code);
+
+    const Repository& classes_;
+    Arena arena_{Arena::Purpose::clone}; // of no request
+    std::vector<const Instance*> objects_;
+};
+
+} // namespace Host

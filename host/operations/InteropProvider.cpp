@@ -1,0 +1,104 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "host/operations/InteropProvider.h"
+
+#include "host/broker/Instance.h"
+#include "host/broker/ObjectPath.h"
+#include "host/broker/String.h"
+
+#include <algorithm>
+
+namespace Host {
+
+namespace {
+
+constexpr CMPIStatus Success = {CMPI_RC_OK, nullptr};
+constexpr const char* ProviderName = "InteropProvider";
+
+const InteropObjects& objectsOf(const CMPIInstanceMI* mi)
+{
+    return *static_cast<const InteropObjects*>(mi->hdl);
+}
+
+std::vector<const Instance*> asked(const CMPIInstanceMI* mi, const CMPIObjectPath* target)
+{
+    return objectsOf(mi).ofClass(ObjectPath::of(target)->className());
+}
+
+CMPIStatus deliver(const Instance& object, const CMPIResult* result, const char** properties)
+{
+    const CMPIInstance* const copy = object.copiedTo(Arena::required()).handle();
+    copy->ft->setPropertyFilter(copy, properties, nullptr);
+    return result->ft->returnInstance(result, copy);
+}
+
+// All keys of these classes are texts.
+bool isAt(const Instance& object, const ObjectPath& target)
+{
+    const NamedValues& keys = object.objectPath().keys();
+    return std::all_of(keys.begin(), keys.end(), [&](const NamedValue& key) {
+        const Value* const wanted = target.key(*key.name->text());
+        return wanted != nullptr && wanted->text() == key.value.text();
+    });
+}
+
+const CMPIInstanceMIFT Functions = {
+    .ftVersion = CMPIVersion200,
+    .miVersion = CMPIVersion200,
+    .miName = ProviderName,
+    .cleanup = [](CMPIInstanceMI*, const CMPIContext*, CMPIBoolean) { return Success; },
+    .enumerateInstanceNames =
+        [](CMPIInstanceMI* mi, const CMPIContext*, const CMPIResult* result,
+            const CMPIObjectPath* target) {
+            for (const Instance* const object : asked(mi, target))
+                result->ft->returnObjectPath(result, object->objectPath().handle());
+            return Success;
+        },
+    .enumerateInstances =
+        [](CMPIInstanceMI* mi, const CMPIContext*, const CMPIResult* result,
+            const CMPIObjectPath* target, const char** properties) {
+            for (const Instance* const object : asked(mi, target))
+                deliver(*object, result, properties);
+            return Success;
+        },
+    .getInstance =
+        [](CMPIInstanceMI* mi, const CMPIContext*, const CMPIResult* result,
+            const CMPIObjectPath* target, const char** properties) {
+            for (const Instance* const object : asked(mi, target))
+                if (isAt(*object, *ObjectPath::of(target)))
+                    deliver(*object, result, properties);
+            return Success;
+        },
+    .createInstance = nullptr, // what is left out is not supported
+    .modifyInstance = nullptr,
+    .deleteInstance = nullptr,
+    .execQuery = nullptr,
+};
+
+} // namespace
+
+InteropProvider::InteropProvider(const Repository& classes, const std::string& hostName)
+    : objects_(classes, hostName), mi_{&objects_, &Functions}
+{
+}
+
+std::vector<ProviderRegistration> InteropProvider::registrations()
+{
+    std::vector<ProviderRegistration> all;
+    for (const char* const className : {ObjectManagerClass, NamespaceClass, RegisteredProfileClass})
+        all.push_back({className, ProviderName, {}, true, false});
+    return all;
+}
+
+CMPIInstanceMI& ProvidersWithInterop::instanceMI(const ProviderRegistration& registration)
+{
+    return registration.providerName == ProviderName ? interop_.instanceMI()
+                                                     : loaded_.instanceMI(registration);
+}
+
+CMPIAssociationMI& ProvidersWithInterop::associationMI(const ProviderRegistration& registration)
+{
+    return loaded_.associationMI(registration);
+}
+
+} // namespace Host

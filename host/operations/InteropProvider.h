@@ -1,0 +1,52 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// The provider of root/interop. It is part of the object manager and reached as others are.
+
+#pragma once
+
+#include "host/manager/ProviderRegistration.h"
+#include "host/manager/ProviderSource.h"
+#include "host/operations/InteropObjects.h"
+
+#include <cmpift.h>
+
+#include <memory>
+#include <string>
+#include <vector>
+
+namespace Host {
+
+// Answers enumerations and get-instance, on any thread.
+class InteropProvider {
+public:
+    // The classes must outlive it.
+    InteropProvider(const Repository& classes, const std::string& hostName);
+
+    CMPIInstanceMI& instanceMI() noexcept { return mi_; }
+
+    // Of the classes it serves; they name no library.
+    static std::vector<ProviderRegistration> registrations();
+
+private:
+    InteropObjects objects_;
+    CMPIInstanceMI mi_;
+};
+
+// The interop provider beside those that are loaded from files.
+class ProvidersWithInterop : public ProviderSource {
+public:
+    // Both must outlive it.
+    ProvidersWithInterop(const Broker& broker, InteropProvider& interop)
+        : interop_(interop), loaded_(broker)
+    {
+    }
+
+    CMPIInstanceMI& instanceMI(const ProviderRegistration& registration) override;
+    CMPIAssociationMI& associationMI(const ProviderRegistration& registration) override;
+
+private:
+    InteropProvider& interop_;
+    LoadedProviders loaded_;
+};
+
+} // namespace Host

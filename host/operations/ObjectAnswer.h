@@ -1,0 +1,54 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// Answers as a transport reads them.
+
+#pragma once
+
+#include "host/cimxml/AnswerWriter.h"
+#include "host/cimxml/OperationHandler.h"
+#include "host/operations/AnswerObjects.h"
+
+#include <cstddef>
+#include <optional>
+#include <string>
+
+namespace Host {
+
+// What operations that open an enumeration or pull say of the rest. Without a context there is
+// none: the sequence has ended.
+struct Continuation {
+    std::optional<std::string> context;
+};
+
+// Written object by object when pieces are asked for. Broker and repository must outlive it.
+class ObjectAnswer : public CimXml::Answer {
+public:
+    ObjectAnswer(const CimXml::Message& message, CimXml::OperationKind kind,
+        const Repository& classes, CimXml::Location location, CimXml::PropertySelection selection,
+        AnswerObjects objects, std::optional<Continuation> continuation);
+
+    bool append(std::string& out) override;
+
+private:
+    void finish();
+
+    AnswerObjects objects_;
+    std::size_t next_ = 0;
+    std::optional<Continuation> continuation_;
+    std::string* out_ = nullptr; // while pieces are appended
+    CimXml::AnswerWriter writer_;
+    bool isFinished_ = false;
+};
+
+// One that is written already, such as that of a failure.
+class WrittenAnswer : public CimXml::Answer {
+public:
+    explicit WrittenAnswer(std::string text) : text_(std::move(text)) {}
+
+    bool append(std::string& out) override;
+
+private:
+    std::string text_; // empty once it was read
+};
+
+} // namespace Host
