@@ -29,6 +29,11 @@ elseif(CMAKE_BUILD_TYPE STREQUAL "Release")
   add_compile_options(-U_FORTIFY_SOURCE -D_FORTIFY_SOURCE=2)
 endif()
 
+# The counters that guide a fuzzer through the rooms.
+if(SENSOR_PROFILE_FUZZ)
+  add_compile_options(-fsanitize=fuzzer-no-link)
+endif()
+
 if(SENSOR_PROFILE_COVERAGE)
   add_compile_options(--coverage)
   add_link_options(--coverage)

@@ -36,7 +36,7 @@ struct Errors {
 template <typename Rule>
 using Control = peg::must_if<Errors>::control<Rule>;
 
-constexpr bool isNameCharacter(char c)
+constexpr bool isIdentifierCharacter(char c)
 {
     return (c >= 'a' && c <= 'z') || (c >= 'A' && c <= 'Z') || (c >= '0' && c <= '9') || c == '_';
 }
@@ -49,8 +49,8 @@ std::string wordAt(std::string_view rest)
     if (rest.front() == '\n' || rest.front() == '\r')
         return "the end of the line";
     std::size_t length = 1;
-    if (isNameCharacter(rest.front()))
-        while (length < rest.size() && isNameCharacter(rest[length]))
+    if (isIdentifierCharacter(rest.front()))
+        while (length < rest.size() && isIdentifierCharacter(rest[length]))
             ++length;
     return quotation(rest.substr(0, length));
 }

@@ -17,7 +17,7 @@ namespace Tools {
 
 namespace {
 
-constexpr const char* footer =
+constexpr const char* listFooter =
     "LOWER and UPPER are limits in the reading's unit, rounded to hundredths:\n"
     "warning/critical/fatal, with - for one that the sensor lacks. A reading of -\n"
     "means that the sensor delivers none.\n"
@@ -38,7 +38,7 @@ public:
         source_.addModel(parser());
         source_.addProvider(parser());
         display_.addTo(parser());
-        parser().footer(footer);
+        parser().footer(listFooter);
     }
 
     ExitCode run(Output& out) override

@@ -21,7 +21,7 @@ namespace Tools {
 
 namespace {
 
-constexpr const char* footer =
+constexpr const char* walkFooter =
     "Each line names an object by its role in an association, with the class of the\n"
     "association. ... stands where more was shown before.";
 
@@ -36,7 +36,7 @@ public:
         source_.addModel(parser());
         source_.addProvider(parser());
         color_.addTo(parser());
-        parser().footer(footer);
+        parser().footer(walkFooter);
     }
 
     ExitCode run(Output& out) override

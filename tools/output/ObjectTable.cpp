@@ -24,7 +24,6 @@ namespace {
 
 using Objects = std::vector<const Host::Instance*>;
 
-constexpr const char* none = "-";
 
 // Beside the references, which have other names in each class, in this order.
 constexpr std::array<std::string_view, 7> shownProperties = {"DeviceID", "InstanceID", "Name",
@@ -87,9 +86,9 @@ Cell cellOf(const Host::Instance& object, const std::string& property)
 {
     const Host::Value* const value = object.property(property);
     if (value == nullptr || value->isNull())
-        return {none, Emphasis::faint};
+        return {absent, Emphasis::faint};
     const std::string text = printable(shown(property, *value));
-    return text.empty() ? Cell{none, Emphasis::faint} : Cell{text};
+    return text.empty() ? Cell{absent, Emphasis::faint} : Cell{text};
 }
 
 } // namespace

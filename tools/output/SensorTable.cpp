@@ -12,8 +12,6 @@ namespace Tools {
 
 namespace {
 
-constexpr const char* none = "-";
-
 using LimitProperties = std::array<const char*, 3>;
 
 constexpr LimitProperties lowerLimits = {
@@ -30,9 +28,9 @@ std::string limitsOf(const SensorView& sensor, const LimitProperties& properties
         const auto limit = sensor.roundedLimit(property);
         if (limit)
             text += skipped + *limit;
-        skipped = (limit ? "" : skipped + none) + "/";
+        skipped = (limit ? "" : skipped + absent) + "/";
     }
-    return text.empty() ? none : text;
+    return text.empty() ? absent : text;
 }
 
 Cell healthOf(const SensorView& sensor)
@@ -58,13 +56,13 @@ Cell stateOf(const SensorView& sensor)
         return {state, Emphasis::critical};
     if (health == Health::warning)
         return {state, Emphasis::warning};
-    return {state.empty() ? none : state, Emphasis::none};
+    return {state.empty() ? absent : state, Emphasis::none};
 }
 
 Cell readingOf(const SensorView& sensor)
 {
     const auto reading = sensor.reading();
-    return reading ? Cell{*reading} : Cell{none, Emphasis::faint};
+    return reading ? Cell{*reading} : Cell{absent, Emphasis::faint};
 }
 
 Cell unitOf(const SensorView& sensor)

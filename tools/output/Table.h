@@ -13,6 +13,9 @@
 
 namespace Tools {
 
+// What stands where there is nothing to show.
+inline constexpr const char* absent = "-";
+
 struct Cell {
     std::string text; // printable
     Emphasis emphasis = Emphasis::none;
