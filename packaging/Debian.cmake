@@ -1,0 +1,54 @@
+# Two Debian packages, made by `cpack` in the build folder: sensor-profile-provider, which can be
+# installed without the other, and sensor-profile, with sensorctl and the service.
+
+set(CPACK_GENERATOR DEB)
+set(CPACK_PACKAGE_NAME sensor-profile)
+# Each package says what it is by itself.
+set(CPACK_PACKAGE_DESCRIPTION_SUMMARY "")
+set(CPACK_PACKAGE_CONTACT "The sensor-profile authors <sensor-profile@example.org>")
+set(CPACK_COMPONENTS_ALL provider tool)
+set(CPACK_DEB_COMPONENT_INSTALL ON)
+set(CPACK_STRIP_FILES ON)
+# The unit and its settings lie outside of /usr.
+set(CPACK_SET_DESTDIR ON)
+set(CPACK_INSTALL_PREFIX /usr)
+set(CPACK_INSTALL_DEFAULT_DIRECTORY_PERMISSIONS
+  OWNER_READ OWNER_WRITE OWNER_EXECUTE GROUP_READ GROUP_EXECUTE WORLD_READ WORLD_EXECUTE)
+
+set(CPACK_DEBIAN_FILE_NAME DEB-DEFAULT)
+set(CPACK_DEBIAN_PACKAGE_RELEASE 1)
+set(CPACK_DEBIAN_PACKAGE_SHLIBDEPS ON)
+set(CPACK_DEBIAN_PACKAGE_CONTROL_STRICT_PERMISSION ON)
+
+set(CPACK_DEBIAN_PROVIDER_PACKAGE_NAME sensor-profile-provider)
+set(CPACK_DEBIAN_PROVIDER_PACKAGE_SECTION libs)
+set(CPACK_DEBIAN_PROVIDER_DESCRIPTION "hardware sensors as CIM instances: CMPI providers
+Fans, voltages and temperatures of a computer for WBEM servers (CIM object
+managers): two provider libraries, their classes in MOF, and a command that
+registers them in OpenPegasus or sfcb.")
+
+set(CPACK_DEBIAN_TOOL_PACKAGE_NAME sensor-profile)
+set(CPACK_DEBIAN_TOOL_PACKAGE_SECTION admin)
+set(CPACK_DEBIAN_TOOL_PACKAGE_DEPENDS
+  "sensor-profile-provider (= ${PROJECT_VERSION}-${CPACK_DEBIAN_PACKAGE_RELEASE}), adduser")
+set(CPACK_DEBIAN_TOOL_PACKAGE_SUGGESTS "lm-sensors, sblim-wbemcli")
+set(CPACK_DEBIAN_TOOL_DESCRIPTION "hardware sensors as CIM instances: tool and server
+sensorctl shows the fans, voltages and temperatures of a computer as CIM
+clients see them, and serves them to such clients over HTTP where no other
+object manager runs.")
+set(CPACK_DEBIAN_TOOL_PACKAGE_CONTROL_EXTRA
+  debian/postinst debian/prerm debian/postrm)
+list(TRANSFORM CPACK_DEBIAN_TOOL_PACKAGE_CONTROL_EXTRA PREPEND "${CMAKE_CURRENT_LIST_DIR}/")
+
+foreach(component IN ITEMS provider tool)
+  string(TOUPPER ${component} name)
+  set(folder doc/${CPACK_DEBIAN_${name}_PACKAGE_NAME})
+  install(FILES debian/copyright
+    DESTINATION "${CMAKE_INSTALL_DATADIR}/${folder}" COMPONENT ${component})
+  install_compressed(FILE debian/changelog AS changelog.Debian
+    FOLDER ${folder} COMPONENT ${component})
+  install_compressed(FILE "${PROJECT_SOURCE_DIR}/CHANGELOG.md" AS changelog
+    FOLDER ${folder} COMPONENT ${component})
+endforeach()
+
+include(CPack)

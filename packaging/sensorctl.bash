@@ -1,0 +1,35 @@
+# Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+# shellcheck shell=bash
+
+# Completion of sensorctl's command line in bash. What there is to complete is read from its help.
+
+# The long options that a help text lists.
+_sensorctl_options() {
+  "$@" --help 2>/dev/null | grep --only-matching --extended-regexp -e '^  .*--[a-z-]+' |
+    grep --only-matching --extended-regexp -e '--[a-z-]+'
+}
+
+_sensorctl_commands() {
+  "$1" --help 2>/dev/null | sed -n '/^Subcommands:/,/^$/s/^  \([a-z]\{1,\}\) .*/\1/p'
+}
+
+_sensorctl() {
+  local tool=$1 word=$2 previous=$3 command=${COMP_WORDS[1]}
+  COMPREPLY=()
+  if [ "$previous" = --color ]; then
+    mapfile -t COMPREPLY < <(compgen -W 'auto always never' -- "$word")
+  elif [ "$COMP_CWORD" -eq 1 ] && [[ $word != -* ]]; then
+    mapfile -t COMPREPLY < <(compgen -W "$(_sensorctl_commands "$tool")" -- "$word")
+  elif [[ $word == -* ]] && [ "$COMP_CWORD" -eq 1 ]; then
+    mapfile -t COMPREPLY < <(compgen -W "$(_sensorctl_options "$tool")" -- "$word")
+  elif [[ $word == -* ]]; then
+    mapfile -t COMPREPLY < <(compgen -W "$(_sensorctl_options "$tool" "$command")" -- "$word")
+  elif [ "$command" = list ] && [[ $previous != -* || $previous == --json ]]; then
+    mapfile -t COMPREPLY < <(compgen -W "$("$tool" list --help 2>/dev/null |
+      grep --only-matching -e 'ZUMLO_[A-Za-z]*') ZUMLO_NumericSensor" -- "$word")
+  else
+    mapfile -t COMPREPLY < <(compgen -f -- "$word")
+  fi
+}
+
+complete -o filenames -o bashdefault -F _sensorctl sensorctl
