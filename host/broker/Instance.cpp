@@ -43,13 +43,10 @@ NameList copied(Arena& arena, NameList names)
     return {copy, names.size()};
 }
 
-void addKeyIfSet(ObjectPath& path, const NamedValues& properties, std::string_view name)
+void addKeyIfSet(ObjectPath& path, std::string_view name, const Value& value)
 {
-    const NamedValue* const found = properties.find(name);
-    if (found == nullptr || found->value.isNull() || isArrayType(found->value.type()) ||
-        found->value.type() == CMPI_instance)
-        return;
-    path.addKey(name, found->value.copiedTo(Arena::required()));
+    if (!value.isNull() && !isArrayType(value.type()) && value.type() != CMPI_instance)
+        path.addKey(name, value.copiedTo(Arena::required()));
 }
 
 } // namespace
@@ -86,13 +83,17 @@ ObjectPath& Instance::objectPath() const
     ObjectPath& path = path_->copiedTo(Arena::required());
     const auto* const known =
         classes_ == nullptr ? nullptr : classes_->keysOf(path.nameSpace(), path.className());
-    if (known != nullptr) {
-        for (const std::string& name : *known)
-            addKeyIfSet(path, properties_, name);
-    } else {
+    if (known == nullptr) {
         for (const String* const name : keyNames_)
-            addKeyIfSet(path, properties_, *name->text());
+            if (const NamedValue* const key = properties_.find(*name->text()))
+                addKeyIfSet(path, *name->text(), key->value);
+        return path;
     }
+    // In the order in which they were set, for providers keep the one of their paths.
+    for (const auto& [name, value] : properties_)
+        for (const std::string& key : *known)
+            if (equalNames(key, *name->text()))
+                addKeyIfSet(path, key, value);
     return path;
 }
 

@@ -32,8 +32,8 @@ public:
     void setProperty(std::string_view name, const Value& value);
 
     // A new path of this thread's request: the one the instance was made with, with the values its
-    // key properties have now. The names of the keys are those of the class where it is known, else
-    // those the provider named in its filter; a key without a value is left out.
+    // key properties have now. Keys are those of the class where it is known, in the order of the
+    // properties, else those the provider named in its filter; one without a value is left out.
     ObjectPath& objectPath() const;
 
     // A new instance, equal to this one.

@@ -117,9 +117,7 @@ TEST_F(FailureTest, SensorsThatTheProviderRefusesAreTheReason)
 
 TEST_F(FailureTest, ToolWithoutItsProviderSaysWhereItLooked)
 {
-    std::filesystem::create_directory(folder_.path() / "bin");
-    const std::string moved = (folder_.path() / "bin" / "sensorctl").string();
-    std::filesystem::copy_file(sensorctl, moved);
+    const std::string moved = install();
     const Ended ended = run({"list", "--model", smallModel()}, {.program = moved});
     EXPECT_EQ(ended.code, 1);
     EXPECT_THAT(ended.err,
@@ -130,9 +128,7 @@ TEST_F(FailureTest, ToolWithoutItsProviderSaysWhereItLooked)
 TEST_F(FailureTest, InstalledToolFindsItsProviderByItsOwnPlace)
 {
     const std::string library = SENSOR_PROFILE_BINARY_DIR "/lib/libSensorProfileProvider.so";
-    std::filesystem::create_directories(folder_.path() / "bin");
-    const std::string moved = (folder_.path() / "bin" / "sensorctl").string();
-    std::filesystem::copy_file(sensorctl, moved);
+    const std::string moved = install();
     for (const char* const place : {"lib", "lib/cmpi"}) {
         std::filesystem::create_directories(folder_.path() / place);
         const auto copy = folder_.path() / place / "libSensorProfileProvider.so";
@@ -140,6 +136,32 @@ TEST_F(FailureTest, InstalledToolFindsItsProviderByItsOwnPlace)
         EXPECT_EQ(run({"list", "--model", smallModel()}, {.program = moved}).code, 0);
         std::filesystem::remove(copy);
     }
+}
+
+TEST_F(FailureTest, ToolWithoutItsClassesSaysWhichFileIsMissing)
+{
+    const std::string moved = install();
+    std::filesystem::remove_all(folder_.path() / "share");
+    const std::string library = SENSOR_PROFILE_BINARY_DIR "/lib/libSensorProfileProvider.so";
+    const Ended ended =
+        run({"list", "--model", smallModel(), "--provider", library}, {.program = moved});
+    EXPECT_EQ(ended.code, 1);
+    EXPECT_EQ(ended.out, "");
+    EXPECT_EQ(ended.err, "sensorctl: " + folder_.path().string() +
+                             "/share/sensor-profile/host.mof: No such file or directory\n");
+}
+
+TEST_F(FailureTest, ClassesThatCannotBeCompiledAreTheReason)
+{
+    const std::string moved = install();
+    const auto file = folder_.path() / "share" / "sensor-profile" / "host.mof";
+    std::ofstream(file) << "class {";
+    const std::string library = SENSOR_PROFILE_BINARY_DIR "/lib/libSensorProfileProvider.so";
+    const Ended ended =
+        run({"list", "--model", smallModel(), "--provider", library}, {.program = moved});
+    EXPECT_EQ(ended.code, 1);
+    EXPECT_EQ(ended.out, "");
+    EXPECT_THAT(ended.err, StartsWith("sensorctl: " + file.string() + ":1:7: "));
 }
 
 TEST_F(FailureTest, ProviderOptionTakesAnyPath)

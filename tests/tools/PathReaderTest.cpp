@@ -5,7 +5,7 @@
 #include "host/broker/Broker.h"
 #include "host/broker/ObjectPath.h"
 #include "host/broker/Request.h"
-#include "host/manager/SensorProfile.h"
+#include "tests/support/ShippedClasses.h"
 #include "tools/UsageError.h"
 
 #include <gmock/gmock.h>
@@ -17,7 +17,7 @@ class PathReaderTest : public testing::Test {
 protected:
     const Host::ObjectPath* read(std::string_view text)
     {
-        return Tools::readPath(request_.arena(), classes_, text);
+        return Tools::readPath(request_.arena(), *classes_, text);
     }
 
     // The path read and written again.
@@ -38,7 +38,7 @@ protected:
         }
     }
 
-    const Host::ClassTable classes_ = Host::sensorProfileClasses();
+    const std::unique_ptr<const Host::Repository> classes_ = Testing::shippedClasses();
     Host::Broker broker_;
     Host::Request request_{broker_};
 };
@@ -48,7 +48,7 @@ TEST_F(PathReaderTest, ReadsWhatIsWritten)
     for (const char* const text : {"//host.example.org:5989/root/"
                                    "cimv2:ZUMLO_ComputerSystem.CreationClassName=\"x\",Name=\"a, "
                                    "b=c: \\\"quoted\\\" back\\\\slash\"",
-             "root/other:ZUMLO_NumericSensor.DeviceID=\"CPU 1:/cpu.0/temp1\",SystemName=\"\"",
+             "root/interop:CIM_Namespace.Name=\"CPU 1:/cpu.0/temp1\",SystemName=\"\"",
              "root/cimv2:CIM_Sensor.A=1,B=-5,C=TRUE,D=18446744073709551615",
              "//h/root/cimv2:ZUMLO_SensorSystemDevice.GroupComponent=\"//h/root/"
              "cimv2:ZUMLO_ComputerSystem.Name=\\\"a\\\\\\\"b\\\"\",PartComponent=\"root/"

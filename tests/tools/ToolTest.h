@@ -10,6 +10,7 @@
 #include <gtest/gtest.h>
 #include <nlohmann/json.hpp>
 
+#include <filesystem>
 #include <fstream>
 #include <iterator>
 #include <sstream>
@@ -56,6 +57,18 @@ protected:
               "baseUnits": 19, "reading": 1200, "lowerNonCritical": 300 },
             { "type": "tachometer", "path": "/board/fan2", "description": "Fan", "status": 13,
               "baseUnits": 19 })");
+    }
+
+    // The tool with its classes in a folder of its own, as an installation puts them; returns the
+    // executable. Without a library yet.
+    std::string install() const
+    {
+        const auto moved = folder_.path() / "bin" / "sensorctl";
+        std::filesystem::create_directory(moved.parent_path());
+        std::filesystem::copy_file(sensorctl, moved);
+        std::filesystem::copy(SENSOR_PROFILE_BINARY_DIR "/share", folder_.path() / "share",
+            std::filesystem::copy_options::recursive);
+        return moved.string();
     }
 
     TemporaryFolder folder_;

@@ -120,14 +120,12 @@ class WalkWithoutCompanionTest : public WalkTest {
 protected:
     WalkWithoutCompanionTest()
     {
-        for (const char* const name : {"bin", "lib"})
-            std::filesystem::create_directory(folder_.path() / name);
-        std::filesystem::copy_file(sensorctl, moved_);
+        std::filesystem::create_directory(folder_.path() / "lib");
         std::filesystem::copy_file(SENSOR_PROFILE_BINARY_DIR "/lib/libSensorProfileProvider.so",
             folder_.path() / "lib" / "libSensorProfileProvider.so");
     }
 
-    const std::string moved_ = (folder_.path() / "bin" / "sensorctl").string();
+    const std::string moved_ = install();
 };
 
 TEST_F(WalkWithoutCompanionTest, TheSystemIsNotServed)

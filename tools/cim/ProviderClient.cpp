@@ -3,10 +3,10 @@
 #include "tools/cim/ProviderClient.h"
 
 #include "host/broker/Instance.h"
-#include "host/broker/Names.h"
 #include "host/broker/ObjectPath.h"
 #include "host/broker/Refusal.h"
 #include "host/manager/SensorProfile.h"
+#include "tools/cim/Classes.h"
 #include "tools/cim/PathReader.h"
 
 #include <stdexcept>
@@ -24,8 +24,8 @@ namespace {
 } // namespace
 
 ProviderClient::ProviderClient(const ProviderFiles& files)
-    : classes_(Host::sensorProfileClasses()),
-      manager_(classes_, Host::sensorProfileProviders(files.sensors, files.computerSystem))
+    : classes_(compileClasses()),
+      manager_(*classes_, Host::sensorProfileProviders(files.sensors, files.computerSystem))
 {
     for (const auto& provider : Host::sensorProfileProviders({}, std::string())) {
         served_.push_back(provider.className);
@@ -37,12 +37,8 @@ ProviderClient::ProviderClient(const ProviderFiles& files)
 
 std::optional<std::string> ProviderClient::declaredClass(std::string_view className) const
 {
-    for (const std::string& served : served_)
-        if (Host::equalNames(served, className))
-            return served;
-    if (classes_.keysOf(nameSpace, className) != nullptr)
-        return std::string(className);
-    return std::nullopt;
+    const Host::ClassDeclaration* const declared = classes_->findClass(nameSpace, className);
+    return declared == nullptr ? std::nullopt : std::optional(declared->name);
 }
 
 Instances ProviderClient::instances(const std::string& className)
@@ -80,7 +76,7 @@ const Host::Instance* ProviderClient::sensor(std::string_view deviceId)
 
 const Host::ObjectPath* ProviderClient::readPath(std::string_view text) const
 {
-    return Tools::readPath(request_->arena(), classes_, text);
+    return Tools::readPath(request_->arena(), *classes_, text);
 }
 
 std::string pathOf(const Host::Instance& instance)

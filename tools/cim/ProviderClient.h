@@ -4,11 +4,12 @@
 
 #pragma once
 
-#include "host/broker/ClassInformation.h"
 #include "host/broker/CollectedResult.h"
 #include "host/broker/Request.h"
 #include "host/manager/Manager.h"
+#include "host/repository/Repository.h"
 
+#include <memory>
 #include <optional>
 #include <string>
 #include <string_view>
@@ -29,8 +30,9 @@ struct ProviderFiles {
 using Instances = std::vector<const Host::Instance*>;
 
 // One request from its making to its end: the objects it returns last as long as it does.
-// Stays on the stack; one at a time. Its operations throw std::runtime_error when a library
-// cannot be used, when a provider answers with an error or leaves a part of its answer out.
+// Stays on the stack; one at a time. It throws std::runtime_error when the classes cannot be
+// compiled, its operations when a library cannot be used, when a provider answers with an error or
+// leaves a part of its answer out.
 class ProviderClient {
 public:
     explicit ProviderClient(const ProviderFiles& files);
@@ -56,7 +58,7 @@ public:
     const Host::ObjectPath* readPath(std::string_view text) const;
 
 private:
-    Host::ClassTable classes_;
+    std::unique_ptr<const Host::Repository> classes_;
     std::vector<std::string> served_;
     std::vector<std::string> associations_;
     Host::Manager manager_;

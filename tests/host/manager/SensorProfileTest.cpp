@@ -11,6 +11,7 @@
 #include "host/broker/Request.h"
 #include "host/manager/Manager.h"
 #include "tests/support/Environment.h"
+#include "tests/support/ShippedClasses.h"
 #include "tests/support/TemporaryFolder.h"
 
 #include <gmock/gmock.h>
@@ -44,12 +45,12 @@ protected:
     Testing::TemporaryFolder folder_;
     Testing::EnvironmentVariable machine_{
         "VORN_INSTRUMENTATION", "model:" + folder_.write("model.json", model)};
-    const Host::ClassTable classes_ = Host::sensorProfileClasses();
+    const std::unique_ptr<const Host::Repository> classes_ = Testing::shippedClasses();
 };
 
 TEST_F(SensorProfileTest, everyClassIsServed)
 {
-    Host::Manager manager(classes_, Host::sensorProfileProviders(sensorLibrary, systemLibrary));
+    Host::Manager manager(*classes_, Host::sensorProfileProviders(sensorLibrary, systemLibrary));
     EXPECT_EQ(count(manager, "ZUMLO_NumericSensor"), 2U);
     EXPECT_EQ(count(manager, "ZUMLO_ComputerSystem"), 1U);
     EXPECT_EQ(count(manager, "ZUMLO_SensorEnabledLogicalElementCapabilities"), 1U);
@@ -61,7 +62,7 @@ TEST_F(SensorProfileTest, everyClassIsServed)
 
 TEST_F(SensorProfileTest, everyObjectsOwnPathFindsIt)
 {
-    Host::Manager manager(classes_, Host::sensorProfileProviders(sensorLibrary, systemLibrary));
+    Host::Manager manager(*classes_, Host::sensorProfileProviders(sensorLibrary, systemLibrary));
     Host::Request request(manager.broker());
     for (const char* const className :
         {"CIM_ManagedElement", "CIM_Component", "CIM_ElementCapabilities"}) {
@@ -78,7 +79,7 @@ TEST_F(SensorProfileTest, everyObjectsOwnPathFindsIt)
 
 TEST_F(SensorProfileTest, theSystemLeadsToItsSensorsAndBack)
 {
-    Host::Manager manager(classes_, Host::sensorProfileProviders(sensorLibrary, systemLibrary));
+    Host::Manager manager(*classes_, Host::sensorProfileProviders(sensorLibrary, systemLibrary));
     Host::Request request(manager.broker());
     Host::CollectedResult systems;
     manager.enumerateInstanceNames(
@@ -97,7 +98,7 @@ TEST_F(SensorProfileTest, theSystemLeadsToItsSensorsAndBack)
 
 TEST_F(SensorProfileTest, withoutTheCompanionSensorsAreStillServed)
 {
-    Host::Manager manager(classes_, Host::sensorProfileProviders(sensorLibrary, std::nullopt));
+    Host::Manager manager(*classes_, Host::sensorProfileProviders(sensorLibrary, std::nullopt));
     EXPECT_EQ(count(manager, "ZUMLO_NumericSensor"), 2U);
     EXPECT_THROW(count(manager, "ZUMLO_ComputerSystem"), Host::Refusal);
 }
@@ -105,7 +106,7 @@ TEST_F(SensorProfileTest, withoutTheCompanionSensorsAreStillServed)
 TEST_F(SensorProfileTest, aMissingLibraryIsAFailureThatNamesIt)
 {
     Host::Manager manager(
-        classes_, Host::sensorProfileProviders(sensorLibrary, "/no/such/library.so"));
+        *classes_, Host::sensorProfileProviders(sensorLibrary, "/no/such/library.so"));
     EXPECT_EQ(count(manager, "ZUMLO_NumericSensor"), 2U);
     try {
         count(manager, "ZUMLO_ComputerSystem");
@@ -118,7 +119,7 @@ TEST_F(SensorProfileTest, aMissingLibraryIsAFailureThatNamesIt)
 
 TEST_F(SensorProfileTest, eightThreadsWalkAtOnce)
 {
-    Host::Manager manager(classes_, Host::sensorProfileProviders(sensorLibrary, systemLibrary));
+    Host::Manager manager(*classes_, Host::sensorProfileProviders(sensorLibrary, systemLibrary));
     std::vector<std::thread> threads;
     for (int i = 0; i < 8; ++i)
         threads.emplace_back([&] {

@@ -9,9 +9,9 @@
 #include "host/broker/String.h"
 #include "host/manager/Manager.h"
 #include "host/manager/SensorProfile.h"
-#include "host/repository/Compiler.h"
 #include "host/repository/Words.h"
 #include "tests/support/Environment.h"
+#include "tests/support/ShippedClasses.h"
 
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
@@ -22,18 +22,11 @@ using ::testing::UnorderedElementsAreArray;
 
 constexpr const char* Cimv2 = "root/cimv2";
 
-std::unique_ptr<const Host::Repository> shippedClasses()
-{
-    Host::Compiler compiler;
-    compiler.compileFile(SENSOR_PROFILE_SOURCE_DIR "/schema/host.mof", Cimv2);
-    return std::move(compiler).finish();
-}
-
 class ProvidedPropertiesTest : public ::testing::TestWithParam<const char*> {
 protected:
     Testing::EnvironmentVariable machine_{
         "VORN_INSTRUMENTATION", "model:" SENSOR_PROFILE_SOURCE_DIR "/schema/demo-model.json"};
-    std::unique_ptr<const Host::Repository> repository_ = shippedClasses();
+    std::unique_ptr<const Host::Repository> repository_ = Testing::shippedClasses();
     Host::Manager manager_{*repository_,
         Host::sensorProfileProviders(SENSOR_PROFILE_BINARY_DIR "/lib/libSensorProfileProvider.so",
             SENSOR_PROFILE_BINARY_DIR "/lib/libComputerSystemProvider.so")};
