@@ -1,0 +1,112 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// What the installed binaries export, what they need, and how they are hardened.
+
+#include "tests/packaging/Installation.h"
+#include "tests/support/ExportedNames.h"
+#include "tests/tools/ToolTest.h"
+
+#include <gmock/gmock.h>
+
+#include <regex>
+#include <set>
+
+namespace {
+
+using testing::Contains;
+using testing::HasSubstr;
+using testing::IsSubsetOf;
+using testing::Not;
+using testing::UnorderedElementsAre;
+using namespace Testing;
+
+constexpr const char* sensorLibrary = "lib/cmpi/libSensorProfileProvider.so";
+constexpr const char* systemLibrary = "lib/cmpi/libComputerSystemProvider.so";
+
+std::string fileOf(const std::string& name)
+{
+    return (movedInstallation() / name).string();
+}
+
+std::string readelf(const std::string& options, const std::string& name)
+{
+    return outputOf("readelf --wide " + options + " '" + fileOf(name) + "'");
+}
+
+// Without the version of their interface, such as libfmt.
+std::set<std::string> neededLibraries(const std::string& name)
+{
+    static const std::regex needed(R"(\(NEEDED\) +Shared library: \[([^.]+)\.so)");
+    const std::string text = readelf("--dynamic", name);
+    std::set<std::string> libraries;
+    for (std::sregex_iterator each(text.begin(), text.end(), needed), end; each != end; ++each)
+        libraries.insert((*each)[1]);
+    return libraries;
+}
+
+class InstalledBinary : public testing::TestWithParam<const char*> {};
+
+TEST_P(InstalledBinary, hasAllTheLibrariesItNeeds)
+{
+    const std::string libraries = outputOf("ldd '" + fileOf(GetParam()) + "' 2>&1");
+    EXPECT_THAT(libraries, HasSubstr("libc.so"));
+    EXPECT_THAT(libraries, Not(HasSubstr("not found")));
+}
+
+TEST_P(InstalledBinary, hasAddressesThatAreFixedAtTheStartAndReadOnlyThen)
+{
+    EXPECT_THAT(readelf("--program-headers", GetParam()), HasSubstr("GNU_RELRO"));
+    const std::string dynamic = readelf("--dynamic", GetParam());
+    EXPECT_TRUE(std::regex_search(dynamic, std::regex(R"(\(FLAGS_1\) +Flags: .*\bNOW\b)")));
+}
+
+TEST_P(InstalledBinary, canLieAnywhereInMemory)
+{
+    EXPECT_THAT(readelf("--file-header", GetParam()), HasSubstr("DYN ("));
+    EXPECT_THAT(readelf("--dynamic", GetParam()), Not(HasSubstr("TEXTREL")));
+}
+
+TEST_P(InstalledBinary, hasAStackThatIsGuardedAndNotExecutable)
+{
+    EXPECT_THAT(readelf("--dyn-syms", GetParam()), HasSubstr("__stack_chk_fail"));
+    EXPECT_TRUE(std::regex_search(readelf("--program-headers", GetParam()),
+        std::regex(R"(GNU_STACK +0x\w+ 0x\w+ 0x\w+ 0x\w+ 0x\w+ RW +)")));
+}
+
+TEST_P(InstalledBinary, isToldNoFoldersOfLibraries)
+{
+    EXPECT_THAT(readelf("--dynamic", GetParam()), Not(HasSubstr("RPATH")));
+    EXPECT_THAT(readelf("--dynamic", GetParam()), Not(HasSubstr("RUNPATH")));
+}
+
+INSTANTIATE_TEST_SUITE_P(InstalledBinaries, InstalledBinary,
+    testing::Values("bin/sensorctl", sensorLibrary, systemLibrary));
+
+TEST(InstalledLibrary, exportsItsFactoriesAndNothingElse)
+{
+    EXPECT_THAT(exportedNames(fileOf(sensorLibrary)),
+        UnorderedElementsAre("SensorProfileProvider_Create_InstanceMI",
+            "SensorEnabledLogicalElementCapabilitiesProvider_Create_InstanceMI",
+            "SensorElementCapabilitiesProvider_Create_InstanceMI",
+            "SensorElementCapabilitiesProvider_Create_AssociationMI",
+            "SensorSystemDeviceProvider_Create_InstanceMI",
+            "SensorSystemDeviceProvider_Create_AssociationMI"));
+    EXPECT_THAT(exportedNames(fileOf(systemLibrary)),
+        UnorderedElementsAre("ComputerSystemProvider_Create_InstanceMI"));
+}
+
+// An object manager pays for every library that a provider draws in.
+TEST(InstalledLibrary, needsNothingOfTheServer)
+{
+    const std::set<std::string> common = {
+        "libc", "libgcc_s", "libstdc++", "libm", "ld-linux-x86-64", "ld-linux-aarch64"};
+    std::set<std::string> forSensors = {"libsensors", "libfmt", "libboost_locale"};
+    forSensors.insert(common.begin(), common.end());
+    std::set<std::string> forSystems = {"libnettle"};
+    forSystems.insert(common.begin(), common.end());
+    EXPECT_THAT(neededLibraries(sensorLibrary), IsSubsetOf(forSensors));
+    EXPECT_THAT(neededLibraries(sensorLibrary), Contains("libsensors"));
+    EXPECT_THAT(neededLibraries(systemLibrary), IsSubsetOf(forSystems));
+}
+
+} // namespace

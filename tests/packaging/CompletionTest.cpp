@@ -1,0 +1,55 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// What bash offers after a part of a command line of sensorctl.
+
+#include "tests/packaging/Installation.h"
+#include "tests/tools/ToolTest.h"
+
+#include <gmock/gmock.h>
+
+namespace {
+
+using testing::Contains;
+using testing::Each;
+using testing::ElementsAre;
+using testing::StartsWith;
+using namespace Testing;
+
+// The words up to the one that is being typed, which comes last.
+std::vector<std::string> offersFor(const std::vector<std::string>& words)
+{
+    const std::string script = R"(
+        source "$0/share/bash-completion/completions/sensorctl"
+        COMP_WORDS=(sensorctl "$@") COMP_CWORD=$#
+        _sensorctl "$0/bin/sensorctl" "${COMP_WORDS[-1]}" "${COMP_WORDS[-2]}"
+        [ ${#COMPREPLY[@]} -eq 0 ] || printf '%s\n' "${COMPREPLY[@]}")";
+    std::vector<std::string> arguments = {"-c", script, movedInstallation().string()};
+    arguments.insert(arguments.end(), words.begin(), words.end());
+    const Ended ended = run(arguments, {.program = "/bin/bash"});
+    EXPECT_EQ(ended.err, "");
+    return linesOf(ended.out);
+}
+
+TEST(Completion, offersCommands)
+{
+    EXPECT_THAT(offersFor({""}), testing::IsSupersetOf({"list", "get", "walk", "record"}));
+    EXPECT_THAT(offersFor({"re"}), ElementsAre("record"));
+}
+
+TEST(Completion, offersTheOptionsOfTheCommand)
+{
+    EXPECT_THAT(offersFor({"list", "--"}),
+        testing::UnorderedElementsAre("--help", "--model", "--provider", "--json", "--color"));
+    EXPECT_THAT(offersFor({"record", "--o"}), ElementsAre("--output"));
+    EXPECT_THAT(offersFor({"--v"}), ElementsAre("--version"));
+}
+
+TEST(Completion, offersValues)
+{
+    EXPECT_THAT(offersFor({"list", "--color", "a"}), ElementsAre("auto", "always"));
+    EXPECT_THAT(offersFor({"list", "ZUMLO_S"}), Each(StartsWith("ZUMLO_Sensor")));
+    EXPECT_THAT(offersFor({"list", "ZUMLO_N"}), ElementsAre("ZUMLO_NumericSensor"));
+    EXPECT_THAT(offersFor({"list", "--model", "/etc/host"}), Contains("/etc/hosts"));
+}
+
+} // namespace

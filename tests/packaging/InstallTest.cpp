@@ -1,0 +1,138 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// An installation, moved from where it was put, works from its own place.
+
+#include "tests/packaging/Installation.h"
+#include "tests/tools/ToolTest.h"
+
+#include <gmock/gmock.h>
+
+namespace {
+
+using nlohmann::json;
+using testing::ElementsAreArray;
+using testing::HasSubstr;
+using testing::Not;
+using namespace Testing;
+namespace fs = std::filesystem;
+
+std::string fileOf(const std::string& name)
+{
+    return (movedInstallation() / name).string();
+}
+
+RunOptions installedTool(std::map<std::string, std::string> environment = {})
+{
+    return {.program = fileOf("bin/sensorctl"), .environment = std::move(environment)};
+}
+
+const std::vector<std::string> providerFiles = {"lib/cmpi/libComputerSystemProvider.so",
+    "lib/cmpi/libSensorProfileProvider.so", "sbin/sensor-profile-register",
+    "share/doc/sensor-profile-provider/changelog.Debian.gz",
+    "share/doc/sensor-profile-provider/changelog.gz", "share/doc/sensor-profile-provider/copyright",
+    "share/locale/de/LC_MESSAGES/sensor-profile.mo",
+    "share/locale/en/LC_MESSAGES/sensor-profile.mo",
+    "share/locale/es/LC_MESSAGES/sensor-profile.mo",
+    "share/locale/fr/LC_MESSAGES/sensor-profile.mo",
+    "share/locale/ja/LC_MESSAGES/sensor-profile.mo", "share/man/man7/sensor-profile.7.gz",
+    "share/man/man8/sensor-profile-register.8.gz", "share/sensor-profile/cim-ancestors.mof",
+    "share/sensor-profile/cim-core.mof", "share/sensor-profile/qualifiers.mof",
+    "share/sensor-profile/registration/sensor-profile-registration.mof",
+    "share/sensor-profile/registration/sensor-profile.reg",
+    "share/sensor-profile/sensor-profile.mof"};
+
+const std::vector<std::string> toolFiles = {"bin/sensorctl",
+    "share/bash-completion/completions/sensorctl", "share/doc/sensor-profile/changelog.Debian.gz",
+    "share/doc/sensor-profile/changelog.gz", "share/doc/sensor-profile/copyright",
+    "share/man/man1/sensorctl.1.gz", "share/man/man5/sensor-profile-model.5.gz",
+    "share/sensor-profile/demo-model.json", "share/sensor-profile/host.mof",
+    "share/sensor-profile/interop.mof", "share/sensor-profile/sensor-profile-model.schema.json"};
+
+TEST(Installed, areTheProviderAndTheTool)
+{
+    std::vector<std::string> all = providerFiles;
+    all.insert(all.end(), toolFiles.begin(), toolFiles.end());
+    std::sort(all.begin(), all.end());
+    EXPECT_THAT(filesBelow(movedInstallation()), ElementsAreArray(all));
+}
+
+TEST(Installed, providerCanBeHadAlone)
+{
+    const TemporaryFolder folder;
+    install({"--component", "provider", "--prefix", folder.path().string()});
+    EXPECT_THAT(filesBelow(folder.path()), ElementsAreArray(providerFiles));
+}
+
+TEST(Installed, toolShowsTheDemonstration)
+{
+    const Ended ended = run({"list", "--model", fileOf("share/sensor-profile/demo-model.json")},
+        installedTool({{"COLUMNS", "80"}}));
+    EXPECT_EQ(ended.err, "");
+    EXPECT_EQ(ended.code, 0);
+    EXPECT_EQ(
+        ended.out, contentOf(SENSOR_PROFILE_SOURCE_DIR "/tests/data/tools/demonstration-list.txt"));
+}
+
+TEST(Installed, toolFindsTheCatalogs)
+{
+    for (const auto& [language, text] :
+        std::map<std::string, std::string>{{"de_DE.UTF-8", "Numerischer Sensor"},
+            {"fr_FR.UTF-8", "Capteur"}, {"es_ES.UTF-8", "Sensor num"}, {"C", "Numeric sensor"}}) {
+        const Ended ended = run(
+            {"get", "12 V", "--json", "--model", fileOf("share/sensor-profile/demo-model.json")},
+            installedTool({{"LC_ALL", language}}));
+        ASSERT_EQ(ended.code, 0) << ended.err;
+        EXPECT_THAT(
+            json::parse(ended.out)["instances"][0]["properties"]["Description"], HasSubstr(text));
+    }
+}
+
+TEST(Installed, toolFollowsTheAssociationsThroughBothLibraries)
+{
+    const Ended ended = run({"walk", "--model", fileOf("share/sensor-profile/demo-model.json")},
+        installedTool({{"LC_ALL", "C.UTF-8"}}));
+    EXPECT_EQ(ended.code, 0) << ended.err;
+    EXPECT_THAT(ended.out, HasSubstr("(ZUMLO_ComputerSystem)"));
+    EXPECT_THAT(ended.out, HasSubstr("PSU 2 Fan"));
+}
+
+// Distributions differ in the name of the folder of libraries.
+TEST(Installed, librariesAreFoundInEveryFolderOfLibraries)
+{
+    const TemporaryFolder folder;
+    const fs::path prefix = folder.path() / "usr";
+    fs::copy(movedInstallation(), prefix, fs::copy_options::recursive);
+    fs::create_directory(folder.path() / "bin");
+    for (const char* const name : {"cimmof", "cimprovider"})
+        fs::create_symlink("/bin/true", folder.path() / "bin" / name);
+    fs::path place = prefix / "lib";
+    for (const char* const next : {"lib64", "lib/" SENSOR_PROFILE_ARCHITECTURE}) {
+        fs::create_directories((prefix / next).parent_path());
+        fs::rename(place / "cmpi", prefix / "cmpi");
+        fs::create_directories(prefix / next);
+        fs::rename(prefix / "cmpi", prefix / next / "cmpi");
+        place = prefix / next;
+        EXPECT_EQ(
+            run({"list", "--model", (prefix / "share/sensor-profile/demo-model.json").string()},
+                {.program = (prefix / "bin/sensorctl").string()})
+                .code,
+            0)
+            << next;
+        const Ended ended = run({"register", "--dry-run", "--provider-folder", "/"},
+            {.program = (prefix / "sbin/sensor-profile-register").string(),
+                .environment = {{"PATH", (folder.path() / "bin").string() + ":/usr/bin:/bin"}}});
+        EXPECT_THAT(ended.out, HasSubstr("ln -s " + (place / "cmpi").string())) << ended.err;
+    }
+}
+
+TEST(Installed, nothingNamesTheBuildTheSourcesOrTheFirstPrefix)
+{
+    for (const std::string& name : filesBelow(movedInstallation())) {
+        const std::string content = contentOf(movedInstallation() / name);
+        EXPECT_THAT(content.find(SENSOR_PROFILE_BINARY_DIR), std::string::npos) << name;
+        EXPECT_THAT(content.find(SENSOR_PROFILE_SOURCE_DIR), std::string::npos) << name;
+        EXPECT_THAT(content.find("made/for"), std::string::npos) << name;
+    }
+}
+
+} // namespace

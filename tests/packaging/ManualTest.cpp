@@ -1,0 +1,114 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// The manual pages are well written, and name what there is.
+
+#include "tests/packaging/Installation.h"
+#include "tests/support/ExportedNames.h"
+#include "tests/tools/ToolTest.h"
+
+#include <gmock/gmock.h>
+
+#include <regex>
+#include <set>
+
+namespace {
+
+using testing::HasSubstr;
+using namespace Testing;
+
+const std::string folder = SENSOR_PROFILE_SOURCE_DIR "/packaging/man/";
+
+std::string rendered(const std::string& page)
+{
+    return outputOf("mandoc -T utf8 -O width=200 '" + folder + page + "' | col -bx");
+}
+
+std::set<std::string> longOptions(const std::string& text)
+{
+    static const std::regex option("--[a-z][a-z-]*");
+    std::set<std::string> options;
+    for (std::sregex_iterator each(text.begin(), text.end(), option), end; each != end; ++each)
+        options.insert(each->str());
+    return options;
+}
+
+class ManualPage : public testing::TestWithParam<const char*> {};
+
+TEST_P(ManualPage, isFreeOfWarnings)
+{
+    const std::string file = folder + GetParam();
+    EXPECT_EQ(outputOf("mandoc -T lint -W warning '" + file + "' 2>&1"), "");
+    EXPECT_EQ(outputOf("LC_ALL=C.UTF-8 MANWIDTH=80 man --warnings -E UTF-8 -l '" + file +
+                       "' 2>&1 >/dev/null"),
+        "");
+}
+
+INSTANTIATE_TEST_SUITE_P(ManualPages, ManualPage,
+    testing::Values(
+        "sensorctl.1", "sensor-profile-model.5", "sensor-profile.7", "sensor-profile-register.8"));
+
+TEST(ManualOfTheTool, namesEveryCommandAndOption)
+{
+    const std::string page = rendered("sensorctl.1");
+    const std::string help = run({"--help"}).out;
+    static const std::regex command("\n  ([a-z]+) +[A-Z]");
+    std::string all = help;
+    int commands = 0;
+    for (std::sregex_iterator each(help.begin(), help.end(), command), end; each != end; ++each) {
+        EXPECT_THAT(page, HasSubstr("sensorctl " + (*each)[1].str()));
+        all += run({(*each)[1], "--help"}).out;
+        ++commands;
+    }
+    EXPECT_GE(commands, 4);
+    for (const std::string& option : longOptions(all))
+        EXPECT_THAT(page, HasSubstr(option));
+}
+
+TEST(ManualOfTheTool, namesNoOptionThatIsNot)
+{
+    std::string all = run({"--help"}).out;
+    for (const char* const command : {"list", "get", "walk", "record"})
+        all += run({command, "--help"}).out;
+    EXPECT_THAT(longOptions(rendered("sensorctl.1")), testing::IsSubsetOf(longOptions(all)));
+}
+
+TEST(ManualOfRegistering, hasTheOptionsOfTheCommand)
+{
+    const Ended help = run(
+        {"--help"}, {.program = (movedInstallation() / "sbin/sensor-profile-register").string()});
+    EXPECT_EQ(longOptions(rendered("sensor-profile-register.8")), longOptions(help.out));
+}
+
+TEST(ManualOfTheModel, hasTheMembersOfTheSchema)
+{
+    const auto schema = nlohmann::json::parse(
+        contentOf(SENSOR_PROFILE_SOURCE_DIR "/schema/sensor-profile-model.schema.json"));
+    const std::string page = rendered("sensor-profile-model.5");
+    for (const auto& [name, member] : schema.at("/$defs/node/properties"_json_pointer).items())
+        EXPECT_THAT(page, HasSubstr(name));
+}
+
+// Each state's row in the table, against what a sensor with such a status shows.
+TEST(ManualOfTheClasses, hasTheStatesThatSensorsShow)
+{
+    const std::map<unsigned, std::string> rows = {{1, "normal"}, {12, "offline"}, {13, "faulty"},
+        {16, "switched off"}, {20, "failure foreseen"}, {21, "in alarm"}, {22, "at or below min"},
+        {23, "at or above max"}, {25, "at or below lcrit"}, {26, "at or above crit"}};
+    const std::string page = rendered("sensor-profile.7");
+    const TemporaryFolder files;
+    for (const auto& [status, row] : rows) {
+        const std::string model = files.write("model.json",
+            R"({"nodes": [{"type": "voltage", "path": "/1", "description": "S", "status": )" +
+                std::to_string(status) + "}]}");
+        const auto document = nlohmann::json::parse(run({"list", "--json", "--model", model}).out);
+        const auto& shown = document["instances"][0]["properties"];
+        const std::regex line("\n *" + row + "[^\n]* " + shown["CurrentState"].get<std::string>() +
+                              " +" + shown["EnabledState"].dump() + " +" +
+                              shown["HealthState"].dump() + " +" +
+                              shown["OperationalStatus"][0].dump() + "\n");
+        EXPECT_TRUE(std::regex_search(page, line)) << row << ": " << shown.dump();
+        EXPECT_EQ(shown["Status"], shown["HealthState"] == 5 ? "OK" : "Error");
+    }
+}
+
+} // namespace

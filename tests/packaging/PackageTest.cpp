@@ -1,0 +1,82 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// The Debian packages, and the scripts that go into them.
+
+#include "tests/support/ExportedNames.h"
+#include "tests/support/TemporaryFolder.h"
+#include "tests/tools/ToolTest.h"
+
+#include <gmock/gmock.h>
+
+namespace {
+
+using testing::HasSubstr;
+using testing::Not;
+using namespace Testing;
+
+const std::string packaging = SENSOR_PROFILE_SOURCE_DIR "/packaging/";
+
+class Packages : public testing::Test {
+protected:
+    static void SetUpTestSuite()
+    {
+        const Ended ended = run({"--config", SENSOR_PROFILE_BINARY_DIR "/CPackConfig.cmake", "-B",
+                                    folder().path().string()},
+            {.program = SENSOR_PROFILE_CPACK});
+        ASSERT_EQ(ended.code, 0) << ended.out << ended.err;
+    }
+
+    static const TemporaryFolder& folder()
+    {
+        static const TemporaryFolder folder;
+        return folder;
+    }
+
+    static std::string field(const std::string& package, const std::string& name)
+    {
+        const std::string file = folder().path().string() + "/" + package + "_";
+        const auto lines = linesOf(outputOf("dpkg-deb --field '" + file + "'*.deb " + name));
+        return lines.empty() ? "" : lines[0];
+    }
+};
+
+TEST_F(Packages, haveNoErrorsForLintian)
+{
+    const std::string complaints =
+        outputOf("lintian --allow-root --fail-on error '" + folder().path().string() +
+                 "'/*.deb 2>&1 && echo passed");
+    EXPECT_THAT(complaints, HasSubstr("passed")) << complaints;
+    EXPECT_THAT(complaints, Not(HasSubstr("E: "))) << complaints;
+}
+
+TEST_F(Packages, dependOnWhatTheyLoad)
+{
+    const std::string provider = field("sensor-profile-provider", "Depends");
+    EXPECT_THAT(provider, HasSubstr("libsensors5"));
+    EXPECT_THAT(provider, HasSubstr("libnettle8"));
+    EXPECT_THAT(provider, Not(HasSubstr("sensor-profile")));
+    EXPECT_THAT(field("sensor-profile", "Depends"),
+        HasSubstr(
+            "sensor-profile-provider (= " + field("sensor-profile-provider", "Version") + ")"));
+}
+
+TEST_F(Packages, haveTheVersionOfTheirLogOfChanges)
+{
+    const std::string log = contentOf(packaging + "debian/changelog");
+    for (const char* const package : {"sensor-profile", "sensor-profile-provider"}) {
+        const std::string version = field(package, "Version");
+        EXPECT_THAT(version, testing::StartsWith(SENSOR_PROFILE_VERSION "-"));
+        EXPECT_THAT(log, testing::StartsWith("sensor-profile (" + version + ") "));
+    }
+}
+
+TEST(Scripts, areFreeOfWarnings)
+{
+    const std::string complaints =
+        outputOf("cd '" + packaging +
+                 "' && shellcheck sensor-profile-register sensorctl.bash debian/postinst "
+                 "debian/prerm debian/postrm 2>&1 && echo passed");
+    EXPECT_EQ(complaints, "passed\n");
+}
+
+} // namespace

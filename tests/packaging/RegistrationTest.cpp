@@ -1,0 +1,144 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// The registration documents against the table by which the embedded object manager finds its
+// providers.
+
+#include "host/manager/SensorProfile.h"
+#include "tests/tools/ToolTest.h"
+
+#include <gmock/gmock.h>
+
+#include <map>
+#include <regex>
+#include <set>
+
+namespace {
+
+using testing::UnorderedElementsAreArray;
+
+const std::string folder = SENSOR_PROFILE_SOURCE_DIR "/schema/registration/";
+constexpr const char* nameSpace = "root/cimv2";
+
+struct Registration {
+    std::string className;
+    std::string provider;
+    std::string location; // the library without lib and .so
+    std::string kinds;
+    std::string nameSpace;
+
+    auto operator<=>(const Registration&) const = default;
+};
+
+void PrintTo(const Registration& each, std::ostream* out)
+{
+    *out << each.className << " by " << each.provider << " in " << each.location << " ("
+         << each.kinds << ", " << each.nameSpace << ")";
+}
+
+std::vector<Registration> embeddedTable()
+{
+    std::vector<Registration> table;
+    for (const Host::ProviderRegistration& each :
+        Host::sensorProfileProviders("SensorProfileProvider", "ComputerSystemProvider")) {
+        std::string kinds = each.servesInstances ? "instance" : "";
+        if (each.servesAssociations)
+            kinds += " association";
+        table.push_back({each.className, each.providerName, each.libraryFile, kinds, nameSpace});
+    }
+    return table;
+}
+
+using Properties = std::map<std::string, std::string>;
+
+// The instances of a MOF document by class; values as they are written, without quotes.
+std::multimap<std::string, Properties> readInstances(const std::string& text)
+{
+    static const std::regex head(R"(instance of (\w+) \{)");
+    static const std::regex property(R"re( +(\w+) = (?:"([^"]*)"|(\{.*\}));.*)re");
+    std::multimap<std::string, Properties> instances;
+    auto current = instances.end();
+    std::smatch match;
+    for (const std::string& line : Testing::linesOf(text)) {
+        if (std::regex_match(line, match, head))
+            current = instances.emplace(match[1], Properties());
+        else if (current != instances.end() && std::regex_match(line, match, property))
+            current->second[match[1]] = match[2].str() + match[3].str();
+        else
+            EXPECT_TRUE(line.empty() || line == "};" || line.starts_with("//")) << line;
+    }
+    return instances;
+}
+
+std::vector<Registration> readBlocks(const std::string& text)
+{
+    static const std::regex head(R"(\[(\w+)\])");
+    static const std::regex member(R"( +(\w+): (.*))");
+    std::vector<Registration> blocks;
+    std::smatch match;
+    for (const std::string& line : Testing::linesOf(text)) {
+        if (std::regex_match(line, match, head)) {
+            blocks.emplace_back().className = match[1];
+            continue;
+        }
+        if (line == "#")
+            continue;
+        if (blocks.empty() || !std::regex_match(line, match, member)) {
+            ADD_FAILURE() << line;
+            continue;
+        }
+        const std::map<std::string, std::string*> members = {{"provider", &blocks.back().provider},
+            {"location", &blocks.back().location}, {"type", &blocks.back().kinds},
+            {"namespace", &blocks.back().nameSpace}};
+        *members.at(match[1]) = match[2];
+    }
+    return blocks;
+}
+
+TEST(RegistrationFile, saysWhatTheEmbeddedManagerKnows)
+{
+    EXPECT_THAT(readBlocks(Testing::contentOf(folder + "sensor-profile.reg")),
+        UnorderedElementsAreArray(embeddedTable()));
+}
+
+TEST(RegistrationMof, saysWhatTheEmbeddedManagerKnows)
+{
+    const auto instances =
+        readInstances(Testing::contentOf(folder + "sensor-profile-registration.mof"));
+    const std::map<std::string, std::string> kinds = {
+        {"{2}", "instance"}, {"{2, 3}", "instance association"}};
+
+    std::map<std::string, std::string> locations; // by module
+    auto [module, lastModule] = instances.equal_range("PG_ProviderModule");
+    for (; module != lastModule; ++module) {
+        const Properties& properties = module->second;
+        EXPECT_TRUE(locations.emplace(properties.at("Name"), properties.at("Location")).second);
+        EXPECT_EQ(properties.at("InterfaceType"), "CMPI");
+        EXPECT_EQ(properties.at("InterfaceVersion"), "2.0.0");
+        EXPECT_EQ(properties.at("Version"), SENSOR_PROFILE_VERSION);
+    }
+    EXPECT_EQ(locations.size(), 2U);
+
+    std::set<std::pair<std::string, std::string>> providers; // with their modules
+    auto [provider, lastProvider] = instances.equal_range("PG_Provider");
+    for (; provider != lastProvider; ++provider) {
+        const Properties& properties = provider->second;
+        EXPECT_TRUE(
+            providers.emplace(properties.at("ProviderModuleName"), properties.at("Name")).second);
+    }
+    EXPECT_EQ(providers.size(), embeddedTable().size());
+
+    std::vector<Registration> registrations;
+    auto [each, last] = instances.equal_range("PG_ProviderCapabilities");
+    for (; each != last; ++each) {
+        const Properties& properties = each->second;
+        const std::string name = properties.at("ProviderName");
+        const std::string moduleName = properties.at("ProviderModuleName");
+        EXPECT_TRUE(providers.contains({moduleName, name})) << name;
+        EXPECT_EQ(properties.at("Namespaces"), "{\"root/cimv2\"}");
+        registrations.push_back({properties.at("ClassName"), name, locations.at(moduleName),
+            kinds.at(properties.at("ProviderType")), nameSpace});
+    }
+    EXPECT_THAT(registrations, UnorderedElementsAreArray(embeddedTable()));
+}
+
+} // namespace
