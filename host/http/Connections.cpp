@@ -1,0 +1,182 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "host/http/Connections.h"
+
+#include "host/http/Address.h"
+#include "host/http/EventLog.h"
+#include "host/http/Timer.h"
+
+#include <sys/socket.h>
+
+#include <algorithm>
+#include <utility>
+
+namespace Host::Http {
+
+namespace {
+
+constexpr std::chrono::milliseconds watchInterval{500};
+constexpr std::chrono::seconds complaintInterval{60};
+
+} // namespace
+
+bool Connections::hasRoomFor(const Address& client)
+{
+    const std::lock_guard lock(mutex_);
+    const auto found = countByNeighbourhood_.find(client.neighbourhood());
+    const bool areTooMany = all_.size() >= limits_.maximumConnections;
+    const bool areTooManyThere = found != countByNeighbourhood_.end() &&
+                                 found->second >= limits_.maximumConnectionsPerAddress;
+    if (!areTooMany && !areTooManyThere)
+        return true;
+    const auto now = Clock::now();
+    if (lastComplaint_ == Clock::time_point{} || now - lastComplaint_ >= complaintInterval) {
+        lastComplaint_ = now;
+        report({"hasRoomFor", "Connections", __LINE__},
+            "refused a connection from " + client.host() + ": there are " +
+                std::to_string(all_.size()) +
+                (areTooMany ? "" : ", too many of them from this address"));
+    }
+    return false;
+}
+
+ClientConnection& Connections::add(
+    int descriptor, const Address& client, std::shared_ptr<const Certificate> certificate)
+{
+    const std::lock_guard lock(mutex_);
+    ClientConnection& connection = all_.emplace_back(descriptor, client, std::move(certificate));
+    try {
+        ++countByNeighbourhood_[connection.neighbourhood];
+    } catch (...) {
+        all_.pop_back();
+        throw;
+    }
+    // Its first request may begin late, but not last for ever without becoming one.
+    connection.deadline = Clock::now() + limits_.idleTimeout + limits_.requestTimeout;
+    watch();
+    return connection;
+}
+
+void Connections::remove(ClientConnection& connection)
+{
+    // Ends outside the lock, with whatever it holds.
+    std::list<ClientConnection> removed;
+    {
+        const std::lock_guard lock(mutex_);
+        if (connection.phase != Phase::idle)
+            --busy_;
+        const auto count = countByNeighbourhood_.find(connection.neighbourhood);
+        if (--count->second == 0)
+            countByNeighbourhood_.erase(count);
+        const auto place = std::find_if(all_.begin(), all_.end(),
+            [&](const ClientConnection& each) { return &each == &connection; });
+        removed.splice(removed.end(), all_, place);
+    }
+    changed_.notify_all();
+}
+
+void Connections::enter(ClientConnection& connection, Phase phase)
+{
+    bool hasEnded = false;
+    {
+        const std::lock_guard lock(mutex_);
+        if (connection.phase == Phase::idle && phase != Phase::idle)
+            ++busy_;
+        if (connection.phase != Phase::idle && phase == Phase::idle) {
+            --busy_;
+            hasEnded = true;
+        }
+        connection.phase = phase;
+        connection.deadline = Clock::now() + patienceIn(phase);
+    }
+    if (hasEnded)
+        changed_.notify_all();
+}
+
+std::chrono::seconds Connections::patienceIn(Phase phase) const
+{
+    switch (phase) {
+    case Phase::receiving:
+        return limits_.requestTimeout;
+    case Phase::answering:
+        return limits_.answerTimeout;
+    default:
+        return limits_.idleTimeout + limits_.requestTimeout;
+    }
+}
+
+bool Connections::mayFallAsleep()
+{
+    const std::lock_guard lock(mutex_);
+    if (isAwake_)
+        return false;
+    ++asleep_;
+    return true;
+}
+
+void Connections::awake()
+{
+    {
+        const std::lock_guard lock(mutex_);
+        --asleep_;
+    }
+    changed_.notify_all();
+}
+
+void Connections::windUp()
+{
+    const std::lock_guard lock(mutex_);
+    isWindingUp_ = true;
+    for (const ClientConnection& connection : all_)
+        if (connection.phase == Phase::idle)
+            ::shutdown(connection.descriptor, SHUT_RD);
+}
+
+bool Connections::isWindingUp() const
+{
+    const std::lock_guard lock(mutex_);
+    return isWindingUp_;
+}
+
+bool Connections::waitUntilQuiet(std::chrono::milliseconds patience)
+{
+    std::unique_lock lock(mutex_);
+    return changed_.wait_for(lock, patience, [this] { return busy_ == 0; });
+}
+
+void Connections::waitUntilAllAreAwake()
+{
+    std::unique_lock lock(mutex_);
+    isAwake_ = true;
+    changed_.wait(lock, [this] { return asleep_ == 0; });
+}
+
+// REQUIRES: the mutex is held.
+void Connections::watch()
+{
+    if (isWatching_ || isWindingUp_ || all_.empty())
+        return;
+    try {
+        timer_.at(Clock::now() + watchInterval, [this] { closeOverdue(); });
+        isWatching_ = true;
+    } catch (...) {
+        return; // the next connection tries again
+    }
+}
+
+void Connections::closeOverdue()
+{
+    const std::lock_guard lock(mutex_);
+    const auto now = Clock::now();
+    for (const ClientConnection& connection : all_) {
+        if (connection.phase == Phase::working || now < connection.deadline)
+            continue;
+        mention({"closeOverdue", "Connections", __LINE__},
+            "a client at " + connection.address + " is too slow");
+        ::shutdown(connection.descriptor, SHUT_RDWR);
+    }
+    isWatching_ = false;
+    watch();
+}
+
+} // namespace Host::Http

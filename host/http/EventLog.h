@@ -1,0 +1,23 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// What the server says to the log.
+
+#pragma once
+
+#include <string>
+
+namespace Host::Http {
+
+struct Place {
+    const char* function;
+    const char* file;
+    unsigned line;
+};
+
+// For the administrator. Any thread.
+void report(const Place& place, const std::string& text) noexcept;
+
+// For those who look for the reason of trouble with one client; as a rule not written.
+void mention(const Place& place, const std::string& text) noexcept;
+
+} // namespace Host::Http

@@ -1,0 +1,182 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "host/http/HeaderCheck.h"
+
+#include "host/cimxml/Message.h"
+#include "host/http/MandatoryExtension.h"
+#include "host/http/MediaType.h"
+
+#include <algorithm>
+#include <charconv>
+
+namespace Host::Http {
+
+namespace {
+
+constexpr std::string_view mismatch = "header-mismatch";
+
+void checkPathAndMethod(const RequestHead& head)
+{
+    if (head.path != "/cimom" && head.path != "/")
+        throw HttpError(Status::notFound, "requests go to /cimom");
+    if (head.method != "POST" && head.method != "M-POST")
+        throw HttpError(Status::methodNotAllowed, "requests are made by POST or M-POST", {},
+            {{"Allow", "POST, M-POST"}});
+}
+
+void checkContent(const RequestHead& head)
+{
+    const auto type = head.find("Content-Type");
+    if (!type || !isXmlInUtf8(*type))
+        throw HttpError(Status::unsupportedMediaType,
+            "the Content-Type must be application/xml or text/xml, in utf-8");
+    const auto coding = head.find("Content-Encoding");
+    if (coding && !equalIgnoringCase(*coding, "identity"))
+        throw HttpError(Status::unsupportedMediaType, "the body must not be compressed");
+}
+
+void checkOperation(const RequestHead& head, const std::string& prefix)
+{
+    const auto operation = head.find(prefix + "CIMOperation");
+    if (!operation || !equalIgnoringCase(*operation, "MethodCall"))
+        throw HttpError(Status::badRequest, "the header field CIMOperation must be MethodCall",
+            "unsupported-operation");
+    const auto version = head.find(prefix + "CIMProtocolVersion");
+    if (version && !version->starts_with("1."))
+        throw HttpError(Status::notImplemented, "the CIMProtocolVersion must be 1.x",
+            "unsupported-protocol-version");
+}
+
+std::optional<int> hexadecimalDigit(char c)
+{
+    int value = 0;
+    const auto [end, error] = std::from_chars(&c, &c + 1, value, 16);
+    if (error != std::errc{} || end != &c + 1)
+        return std::nullopt;
+    return value;
+}
+
+// With the octets that stand behind percent signs.
+std::string decoded(std::string_view text, const std::string& name)
+{
+    std::string result;
+    for (std::size_t i = 0; i < text.size(); ++i) {
+        if (text[i] != '%') {
+            result += text[i];
+            continue;
+        }
+        const auto high = i + 2 < text.size() ? hexadecimalDigit(text[i + 1]) : std::nullopt;
+        const auto low = high ? hexadecimalDigit(text[i + 2]) : std::nullopt;
+        if (!low)
+            throw HttpError(Status::badRequest,
+                "the header field " + name + " holds a percent sign without two digits", mismatch);
+        result += static_cast<char>(*high * 16 + *low);
+        i += 2;
+    }
+    return result;
+}
+
+std::optional<std::string> findDecoded(const RequestHead& head, const std::string& name)
+{
+    const auto value = head.find(name);
+    if (!value)
+        return std::nullopt;
+    return decoded(*value, name);
+}
+
+// Of a path with or without host, class and keys.
+std::string_view nameSpaceIn(std::string_view object)
+{
+    if (object.starts_with("//")) {
+        const std::size_t end = object.find('/', 2);
+        object.remove_prefix(end == std::string_view::npos ? object.size() : end);
+    }
+    object = object.substr(0, object.find(':'));
+    while (object.starts_with('/'))
+        object.remove_prefix(1);
+    while (object.ends_with('/'))
+        object.remove_suffix(1);
+    return object;
+}
+
+} // namespace
+
+BodySize bodySizeOf(const RequestHead& head)
+{
+    BodySize body;
+    if (const auto expectation = head.find("Expect")) {
+        if (!equalIgnoringCase(*expectation, "100-continue"))
+            throw HttpError::framing(
+                Status::expectationFailed, "the only expectation met is 100-continue");
+        body.isAwaited = true;
+    }
+    const auto length = head.find("Content-Length");
+    if (const auto coding = head.find("Transfer-Encoding")) {
+        if (!equalIgnoringCase(*coding, "chunked"))
+            throw HttpError::framing(
+                Status::notImplemented, "the only Transfer-Encoding is chunked");
+        if (length)
+            throw HttpError::framing(
+                Status::badRequest, "both Content-Length and Transfer-Encoding are there");
+        return body;
+    }
+    body.bytes = 0;
+    if (!length)
+        return body;
+    const char* const end = length->data() + length->size();
+    const auto [stop, error] = std::from_chars(length->data(), end, *body.bytes);
+    if (error == std::errc::result_out_of_range)
+        throw HttpError::framing(Status::contentTooLarge, "the body is far too large");
+    if (error != std::errc{} || stop != end)
+        throw HttpError::framing(Status::badRequest, "the Content-Length is no number");
+    return body;
+}
+
+CallHead checkHead(const RequestHead& head, const BodySize& body, const Limits& limits)
+{
+    checkPathAndMethod(head);
+    CallHead call;
+    if (head.method == "M-POST")
+        call.extension = mandatoryExtensionOf(head);
+    const std::string prefix = call.extension ? *call.extension + "-" : "";
+    checkContent(head);
+    if (body.bytes && !head.find("Content-Length"))
+        throw HttpError::framing(Status::lengthRequired,
+            "neither Content-Length nor Transfer-Encoding says where the body ends");
+    if (body.bytes && *body.bytes > limits.maximumBody)
+        throw HttpError(Status::contentTooLarge,
+            "a body holds at most " + std::to_string(limits.maximumBody) + " bytes");
+    checkOperation(head, prefix);
+    call.method = findDecoded(head, prefix + "CIMMethod");
+    call.object = findDecoded(head, prefix + "CIMObject");
+    call.acceptLanguage = head.find("Accept-Language").value_or("");
+    return call;
+}
+
+void requireMatch(const CallHead& head, const CimXml::Message& message)
+{
+    if (head.method && !equalIgnoringCase(*head.method, message.methodName()))
+        throw HttpError(Status::badRequest,
+            "CIMMethod is " + *head.method + ", but the body calls " + message.methodName(),
+            mismatch);
+    if (head.object && !equalIgnoringCase(nameSpaceIn(*head.object), message.nameSpace()))
+        throw HttpError(Status::badRequest,
+            "CIMObject is " + *head.object + ", but the body is for " + message.nameSpace(),
+            mismatch);
+}
+
+std::vector<HeaderField> answerFieldsFor(const CallHead& head)
+{
+    std::vector<HeaderField> fields{{"Content-Type", "application/xml; charset=utf-8"}};
+    if (!head.extension) {
+        fields.push_back({"CIMOperation", "MethodResponse"});
+        return fields;
+    }
+    fields.push_back({"Man", std::string(mandatoryExtension) + ";ns=" + *head.extension});
+    fields.push_back({"Ext", ""});
+    fields.push_back({"Cache-Control", "no-cache"});
+    fields.push_back({*head.extension + "-CIMOperation", "MethodResponse"});
+    return fields;
+}
+
+} // namespace Host::Http

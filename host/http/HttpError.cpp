@@ -1,0 +1,48 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "host/http/HttpError.h"
+
+#include "host/cimxml/RequestError.h"
+
+#include <utility>
+
+namespace Host::Http {
+
+using CimXml::Outcome;
+
+namespace {
+
+unsigned statusOf(Outcome outcome)
+{
+    switch (outcome) {
+    case Outcome::unsupportedCimVersion:
+    case Outcome::unsupportedDtdVersion:
+    case Outcome::unsupportedProtocolVersion:
+    case Outcome::multipleRequestsUnsupported:
+        return Status::notImplemented;
+    default:
+        return Status::badRequest;
+    }
+}
+
+} // namespace
+
+HttpError::HttpError(unsigned status, const std::string& reason, std::string_view cimError,
+    std::vector<HeaderField> fields)
+    : std::runtime_error(reason), status_(status), cimError_(cimError), fields_(std::move(fields))
+{
+}
+
+HttpError::HttpError(const CimXml::RequestError& error)
+    : HttpError(statusOf(error.outcome()), error.what(), nameOf(error.outcome()))
+{
+}
+
+HttpError HttpError::framing(unsigned status, const std::string& reason)
+{
+    HttpError error(status, reason);
+    error.endsConnection_ = true;
+    return error;
+}
+
+} // namespace Host::Http

@@ -1,0 +1,33 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#pragma once
+
+#include <chrono>
+#include <cstddef>
+
+namespace Host::Http {
+
+// What clients may take of the server.
+struct Limits {
+    std::size_t maximumBody = std::size_t{1} << 20;    // bytes of a request
+    std::size_t maximumHeader = std::size_t{16} << 10; // bytes of its first line and its fields
+
+    std::size_t maximumConnections = 256;
+    std::size_t maximumConnectionsPerAddress = 64; // an IPv6 network of 64 bits is one address
+
+    // Operations that run at a time, and those that wait for their turn.
+    std::size_t workers = 4;
+    std::size_t maximumQueue = 128;
+
+    // How long a connection may be still, how long a request may take to come in, and how long
+    // the client may take to fetch the answer.
+    std::chrono::seconds idleTimeout{60};
+    std::chrono::seconds requestTimeout{30};
+    std::chrono::seconds answerTimeout{600};
+
+    // The delay after the first wrong password. It doubles with each further one from the same
+    // address, up to 32 times.
+    std::chrono::milliseconds signInDelay{1000};
+};
+
+} // namespace Host::Http

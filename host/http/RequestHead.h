@@ -1,0 +1,31 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// The first line of a request and its header fields.
+
+#pragma once
+
+#include "host/http/HttpError.h"
+
+#include <optional>
+#include <string>
+#include <string_view>
+#include <vector>
+
+namespace Host::Http {
+
+struct RequestHead {
+    std::string method;
+    std::string path; // without query
+    std::vector<HeaderField> fields;
+
+    // The value without white space at its ends. Names know no letter case. Throws HttpError
+    // when the field is there more than once.
+    std::optional<std::string_view> find(std::string_view name) const;
+};
+
+bool equalIgnoringCase(std::string_view a, std::string_view b);
+
+// Without spaces and tabs at its ends.
+std::string_view withoutBlanks(std::string_view text);
+
+} // namespace Host::Http

@@ -1,0 +1,68 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "host/http/Response.h"
+
+#include "host/http/Exchange.h"
+
+#include <microhttpd.h>
+
+#include <cstddef>
+#include <cstdint>
+#include <new>
+
+namespace Host::Http {
+
+namespace {
+
+constexpr std::size_t pieceSize = std::size_t{32} << 10;
+
+::ssize_t readPiece(void* exchange, std::uint64_t, char* to, std::size_t room)
+{
+    return static_cast<Exchange*>(exchange)->read(to, room);
+}
+
+} // namespace
+
+void Response::Freeing::operator()(MHD_Response* response) const
+{
+    ::MHD_destroy_response(response);
+}
+
+Response::Response(MHD_Response* response) : response_(response)
+{
+    if (!response_)
+        throw std::bad_alloc();
+}
+
+Response Response::whole(const std::string& text)
+{
+    // The library writes nothing to it.
+    return Response(::MHD_create_response_from_buffer(
+        text.size(), const_cast<char*>(text.data()), MHD_RESPMEM_PERSISTENT));
+}
+
+Response Response::inPieces(Exchange& exchange)
+{
+    return Response(::MHD_create_response_from_callback(
+        MHD_SIZE_UNKNOWN, pieceSize, &readPiece, &exchange, nullptr));
+}
+
+void Response::add(const HeaderField& field)
+{
+    // The library takes no empty value, but one that a reader sees as empty.
+    const char* const value = field.value.empty() ? " " : field.value.c_str();
+    if (::MHD_add_response_header(response_.get(), field.name.c_str(), value) != MHD_YES)
+        throw std::bad_alloc();
+}
+
+void Response::endConnection()
+{
+    add({"Connection", "close"});
+}
+
+bool Response::queue(MHD_Connection& connection, unsigned status)
+{
+    return ::MHD_queue_response(&connection, status, response_.get()) == MHD_YES;
+}
+
+} // namespace Host::Http

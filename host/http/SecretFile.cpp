@@ -1,0 +1,96 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "host/http/SecretFile.h"
+
+#include <fcntl.h>
+#include <sys/stat.h>
+#include <unistd.h>
+
+#include <array>
+#include <cerrno>
+#include <cstddef>
+#include <stdexcept>
+#include <string_view>
+#include <system_error>
+
+namespace Host::Http {
+
+namespace {
+
+constexpr std::size_t maximumSize = std::size_t{1} << 20;
+
+[[noreturn]] void failAt(const std::string& file, const std::string& reason)
+{
+    throw std::runtime_error(file + ": " + reason);
+}
+
+[[noreturn]] void failByErrno(const std::string& file)
+{
+    failAt(file, std::system_category().message(errno));
+}
+
+class OpenFile {
+public:
+    explicit OpenFile(const std::string& file)
+        : descriptor_(::open(file.c_str(), O_RDONLY | O_CLOEXEC | O_NONBLOCK))
+    {
+        if (descriptor_ < 0)
+            failByErrno(file);
+    }
+    ~OpenFile() { ::close(descriptor_); }
+    OpenFile(const OpenFile&) = delete;
+    OpenFile& operator=(const OpenFile&) = delete;
+
+    int descriptor() const { return descriptor_; }
+
+private:
+    int descriptor_;
+};
+
+std::string readAll(int descriptor, const std::string& file)
+{
+    std::string content;
+    std::array<char, 4096> piece{};
+    for (;;) {
+        const ::ssize_t got = ::read(descriptor, piece.data(), piece.size());
+        if (got < 0 && errno == EINTR)
+            continue;
+        if (got < 0)
+            failByErrno(file);
+        if (got == 0)
+            return content;
+        content.append(piece.data(), static_cast<std::size_t>(got));
+        if (content.size() > maximumSize)
+            failAt(file, "it is larger than a megabyte");
+    }
+}
+
+// The mode bits that must not be set.
+std::string readFile(const std::string& file, ::mode_t forbidden, std::string_view advice)
+{
+    const OpenFile open(file);
+    struct stat status = {};
+    if (::fstat(open.descriptor(), &status) != 0)
+        failByErrno(file);
+    if (!S_ISREG(status.st_mode))
+        failAt(file, "it is no regular file");
+    if ((status.st_mode & forbidden) != 0)
+        failAt(file, std::string(advice));
+    return readAll(open.descriptor(), file);
+}
+
+} // namespace
+
+std::string readSecretFile(const std::string& file)
+{
+    return readFile(file, S_IWGRP | S_IRWXO,
+        "others than its owner can change it, or anybody can read it (chmod 600 or 640 mends "
+        "that)");
+}
+
+std::string readPublicFile(const std::string& file)
+{
+    return readFile(file, 0, "");
+}
+
+} // namespace Host::Http

@@ -1,0 +1,46 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "host/http/SignIns.h"
+
+#include "host/http/EventLog.h"
+
+#include <utility>
+
+namespace Host::Http {
+
+bool SignIns::areDemanded() const
+{
+    return passwords() != nullptr;
+}
+
+void SignIns::replacePasswords(std::shared_ptr<const Passwords> passwords)
+{
+    {
+        const std::lock_guard lock(mutex_);
+        passwords_ = std::move(passwords);
+    }
+    memory_.forgetAll();
+}
+
+bool SignIns::tryPassword(const Credentials& credentials, const std::string& address)
+{
+    const auto current = passwords();
+    if (!current->matches(credentials.user, credentials.password)) {
+        report({"tryPassword", "SignIns", __LINE__},
+            "wrong password for \"" + credentials.user + "\" from " + address);
+        return false;
+    }
+    // Not when the passwords have changed meanwhile.
+    const std::lock_guard lock(mutex_);
+    if (passwords_ == current)
+        memory_.remember(credentials, std::chrono::steady_clock::now());
+    return true;
+}
+
+std::shared_ptr<const Passwords> SignIns::passwords() const
+{
+    const std::lock_guard lock(mutex_);
+    return passwords_;
+}
+
+} // namespace Host::Http

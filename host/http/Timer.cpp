@@ -1,0 +1,59 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "host/http/Timer.h"
+
+#include <utility>
+
+namespace Host::Http {
+
+Timer::Timer() : thread_([this] { run(); }) {}
+
+void Timer::at(Time time, std::function<void()> action)
+{
+    {
+        const std::lock_guard lock(mutex_);
+        if (!isEnding_) {
+            actions_.emplace(time, std::move(action));
+            changed_.notify_all();
+            return;
+        }
+    }
+    action();
+}
+
+void Timer::end()
+{
+    {
+        const std::lock_guard lock(mutex_);
+        isEnding_ = true;
+    }
+    changed_.notify_all();
+    if (thread_.joinable())
+        thread_.join();
+}
+
+void Timer::run()
+{
+    std::unique_lock lock(mutex_);
+    for (;;) {
+        if (actions_.empty()) {
+            if (isEnding_)
+                return;
+            changed_.wait(lock);
+            continue;
+        }
+        const auto first = actions_.begin();
+        const Time due = first->first;
+        if (!isEnding_ && std::chrono::steady_clock::now() < due) {
+            changed_.wait_until(lock, due);
+            continue;
+        }
+        const auto action = std::move(first->second);
+        actions_.erase(first);
+        lock.unlock();
+        action();
+        lock.lock();
+    }
+}
+
+} // namespace Host::Http

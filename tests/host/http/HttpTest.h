@@ -1,0 +1,126 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// A server with operations of the test's making, and requests to it.
+
+#pragma once
+
+#include "host/cimxml/Message.h"
+#include "host/http/Certificate.h"
+#include "host/http/ListenPolicy.h"
+#include "host/http/ListeningSocket.h"
+#include "host/http/Passwords.h"
+#include "host/http/Server.h"
+#include "tests/support/HttpClient.h"
+
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+#include <atomic>
+#include <functional>
+#include <memory>
+#include <mutex>
+#include <string>
+#include <vector>
+
+namespace HttpTests {
+
+using Host::CimXml::Caller;
+using Host::CimXml::Message;
+using Testing::HttpClient;
+using Testing::HttpReply;
+
+// So many pieces of so many bytes.
+class PiecewiseAnswer : public Host::CimXml::Answer {
+public:
+    PiecewiseAnswer(std::string piece, std::size_t count, std::atomic<int>& alive)
+        : piece_(std::move(piece)), left_(count), alive_(alive)
+    {
+        ++alive_;
+    }
+    ~PiecewiseAnswer() override { --alive_; }
+
+    bool append(std::string& out) override
+    {
+        if (left_ == 0)
+            return false;
+        --left_;
+        out += piece_;
+        return true;
+    }
+
+private:
+    std::string piece_;
+    std::size_t left_;
+    std::atomic<int>& alive_;
+};
+
+// Answers with what `text` is, so many times; whoever wants something else sets `work`.
+class StubOperations : public Host::CimXml::OperationHandler {
+public:
+    std::unique_ptr<Host::CimXml::Answer> answer(
+        const Message& message, const Caller& caller) override
+    {
+        ++calls;
+        if (work)
+            work(message, caller);
+        return std::make_unique<PiecewiseAnswer>(text, repetitions, answersAlive);
+    }
+
+    std::function<void(const Message&, const Caller&)> work{};
+    std::string text = "<answer/>";
+    std::size_t repetitions = 1;
+    std::atomic<int> calls{0};
+    std::atomic<int> answersAlive{0};
+};
+
+inline std::string bodyFor(const std::string& operation, const std::string& name = "root")
+{
+    return R"(<?xml version="1.0" encoding="utf-8"?><CIM CIMVERSION="2.0" DTDVERSION="2.0">)"
+           R"(<MESSAGE ID="1" PROTOCOLVERSION="1.0"><SIMPLEREQ><IMETHODCALL NAME=")" +
+           operation + R"("><LOCALNAMESPACEPATH><NAMESPACE NAME=")" + name +
+           R"("/><NAMESPACE NAME="cimv2"/></LOCALNAMESPACEPATH></IMETHODCALL></SIMPLEREQ>)"
+           "</MESSAGE></CIM>";
+}
+
+inline const std::string usualFields = "Host: localhost\r\nContent-Type: application/xml\r\n"
+                                       "CIMOperation: MethodCall\r\n";
+
+inline std::string lengthField(const std::string& body)
+{
+    return "Content-Length: " + std::to_string(body.size()) + "\r\n";
+}
+
+inline std::string post(const std::string& moreFields = "",
+    const std::string& body = bodyFor("EnumerateClasses"), const std::string& path = "/cimom")
+{
+    return "POST " + path + " HTTP/1.1\r\n" + usualFields + lengthField(body) + moreFields +
+           "\r\n" + body;
+}
+
+class HttpTest : public testing::Test {
+protected:
+    void start(std::vector<Host::Http::Endpoint> endpoints = {{{"127.0.0.1", 0}}})
+    {
+        auto sockets = Host::Http::listenOn(std::move(endpoints));
+        port = sockets.front().address().port();
+        server.emplace(operations, std::move(sockets), limits, certificate, passwords);
+    }
+
+    HttpClient connect() const { return HttpClient(port); }
+
+    HttpReply ask(const std::string& request)
+    {
+        HttpClient client = connect();
+        client.send(request);
+        return client.receive();
+    }
+
+    StubOperations operations;
+    Host::Http::Limits limits;
+    std::shared_ptr<const Host::Http::Certificate> certificate;
+    std::shared_ptr<const Host::Http::Passwords> passwords;
+    std::optional<Host::Http::Server> server;
+    std::uint16_t port = 0;
+};
+
+} // namespace HttpTests

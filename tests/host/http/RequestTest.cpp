@@ -1,0 +1,206 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// Requests and their answers, over sockets.
+
+#include "tests/host/http/HttpTest.h"
+
+namespace HttpTests {
+
+namespace {
+
+using testing::HasSubstr;
+using testing::StartsWith;
+
+class RequestTest : public HttpTest {
+protected:
+    RequestTest() { start(); }
+};
+
+TEST_F(RequestTest, AnswersWithWhatTheOperationSays)
+{
+    const HttpReply reply = ask(post());
+    EXPECT_EQ(reply.status, 200);
+    EXPECT_EQ(reply.body, "<answer/>");
+    EXPECT_EQ(reply.field("content-type"), "application/xml; charset=utf-8");
+    EXPECT_EQ(reply.field("cimoperation"), "MethodResponse");
+    EXPECT_EQ(reply.field("content-length"), "9");
+    EXPECT_EQ(reply.field("connection"), "");
+    EXPECT_EQ(reply.field("cimerror"), "");
+}
+
+TEST_F(RequestTest, TellsTheOperationWhoAsks)
+{
+    Caller seen;
+    std::string method;
+    operations.work = [&](const Message& message, const Caller& caller) {
+        seen = caller;
+        method = message.methodName();
+    };
+    ask(post("Accept-Language: de, en;q=0.5\r\n"));
+    EXPECT_EQ(method, "EnumerateClasses");
+    EXPECT_EQ(seen.principal, "");
+    EXPECT_EQ(seen.address, "127.0.0.1");
+    EXPECT_EQ(seen.acceptLanguage, "de, en;q=0.5");
+}
+
+TEST_F(RequestTest, MandatoryPostIsAnsweredAlike)
+{
+    const std::string body = bodyFor("EnumerateClasses");
+    const HttpReply reply =
+        ask("M-POST /cimom HTTP/1.1\r\nHost: localhost\r\nContent-Type: text/xml\r\n" +
+            lengthField(body) +
+            "Man: http://www.dmtf.org/cim/mapping/http/v1.0 ; ns=73\r\n"
+            "73-CIMOperation: MethodCall\r\n73-CIMMethod: EnumerateClasses\r\n"
+            "73-CIMObject: root%2Fcimv2\r\n\r\n" +
+            body);
+    EXPECT_EQ(reply.status, 200);
+    EXPECT_TRUE(reply.fields.contains("ext"));
+    EXPECT_EQ(reply.field("ext"), "");
+    EXPECT_EQ(reply.field("man"), "http://www.dmtf.org/cim/mapping/http/v1.0;ns=73");
+    EXPECT_EQ(reply.field("73-cimoperation"), "MethodResponse");
+    EXPECT_EQ(reply.body, "<answer/>");
+}
+
+TEST_F(RequestTest, ConnectionTakesRequestAfterRequest)
+{
+    HttpClient client = connect();
+    for (int i = 0; i < 20; ++i) {
+        client.send(post());
+        EXPECT_EQ(client.receive().body, "<answer/>");
+    }
+    EXPECT_EQ(operations.calls, 20);
+}
+
+TEST_F(RequestTest, ErrorsLeaveTheConnectionForFurtherRequests)
+{
+    HttpClient client = connect();
+    client.send(post("", "<CIM"));
+    const HttpReply malformed = client.receive();
+    EXPECT_EQ(malformed.status, 400);
+    EXPECT_EQ(malformed.field("cimerror"), "request-not-well-formed");
+    EXPECT_THAT(malformed.body, StartsWith("line 1, byte "));
+    client.send(post("CIMObject: root/other\r\n"));
+    EXPECT_EQ(client.receive().field("cimerror"), "header-mismatch");
+    client.send(post("", bodyFor("EnumerateClasses"), "/elsewhere"));
+    EXPECT_EQ(client.receive().status, 404);
+    client.send("GET /cimom HTTP/1.1\r\nHost: localhost\r\n\r\n");
+    const HttpReply notAllowed = client.receive();
+    EXPECT_EQ(notAllowed.status, 405);
+    EXPECT_EQ(notAllowed.field("allow"), "POST, M-POST");
+    client.send(post());
+    EXPECT_EQ(client.receive().status, 200);
+}
+
+TEST_F(RequestTest, PipelinedRequestsAreAnsweredInTheirOrder)
+{
+    operations.work = [&](const Message& message, const Caller&) {
+        operations.text = message.methodName();
+    };
+    HttpClient client = connect();
+    client.send(
+        post("", bodyFor("First")) + post("", bodyFor("Second")) + post("", bodyFor("Third")));
+    EXPECT_EQ(client.receive().body, "First");
+    EXPECT_EQ(client.receive().body, "Second");
+    EXPECT_EQ(client.receive().body, "Third");
+}
+
+TEST_F(RequestTest, BodyMayComeInChunks)
+{
+    const std::string body = bodyFor("EnumerateClasses");
+    const auto chunk = [](const std::string& text) {
+        std::ostringstream size;
+        size << std::hex << text.size();
+        return size.str() + "\r\n" + text + "\r\n";
+    };
+    const HttpReply reply =
+        ask("POST /cimom HTTP/1.1\r\n" + usualFields + "Transfer-Encoding: chunked\r\n\r\n" +
+            chunk(body.substr(0, 50)) + chunk(body.substr(50)) + "0\r\n\r\n");
+    EXPECT_EQ(reply.body, "<answer/>");
+}
+
+TEST_F(RequestTest, RequestMayComeByteByByte)
+{
+    HttpClient client = connect();
+    for (const char c : post())
+        client.send(std::string(1, c));
+    EXPECT_EQ(client.receive().body, "<answer/>");
+}
+
+TEST_F(RequestTest, ConnectionThatEndsSaysSo)
+{
+    HttpClient client = connect();
+    client.send(post("Connection: close\r\n"));
+    EXPECT_EQ(client.receive().field("connection"), "close");
+    EXPECT_TRUE(client.isClosed());
+}
+
+TEST_F(RequestTest, ClientThatAwaitsASignGetsIt)
+{
+    const std::string body = bodyFor("EnumerateClasses");
+    HttpClient client = connect();
+    client.send("POST /cimom HTTP/1.1\r\n" + usualFields + lengthField(body) +
+                "Expect: 100-continue\r\n\r\n");
+    EXPECT_THAT(client.receiveSome(), StartsWith("HTTP/1.1 100 "));
+    client.send(body);
+    EXPECT_EQ(client.receive().status, 200);
+}
+
+TEST_F(RequestTest, ClientThatAwaitsASignHearsOfAnErrorInstead)
+{
+    HttpClient client = connect();
+    client.send("POST /cimom HTTP/1.1\r\nHost: localhost\r\nContent-Type: text/plain\r\n"
+                "Content-Length: 100\r\nExpect: 100-continue\r\n\r\n");
+    const HttpReply reply = client.receive();
+    EXPECT_EQ(reply.status, 415);
+    EXPECT_EQ(reply.field("connection"), "close");
+    EXPECT_TRUE(client.isClosed());
+}
+
+TEST_F(RequestTest, LargeAnswersComeInChunks)
+{
+    operations.text = std::string(1000, 'x');
+    operations.repetitions = 5000;
+    HttpClient client = connect();
+    for (int i = 0; i < 3; ++i) {
+        client.send(post());
+        const HttpReply reply = client.receive();
+        EXPECT_EQ(reply.field("transfer-encoding"), "chunked");
+        EXPECT_EQ(reply.body, std::string(5'000'000, 'x'));
+    }
+}
+
+TEST_F(RequestTest, OldClientsGetTheAnswerUntilTheEndOfTheConnection)
+{
+    operations.text = std::string(1000, 'x');
+    operations.repetitions = 500;
+    const std::string body = bodyFor("EnumerateClasses");
+    HttpClient client = connect();
+    client.send("POST /cimom HTTP/1.0\r\n" + usualFields + lengthField(body) + "\r\n" + body);
+    std::string all;
+    for (std::string piece = client.receiveSome(); !piece.empty(); piece = client.receiveSome())
+        all += piece;
+    EXPECT_THAT(all, HasSubstr("Connection: close"));
+    EXPECT_TRUE(all.ends_with("\r\n\r\n" + std::string(500'000, 'x')));
+}
+
+TEST_F(RequestTest, OperationThatThrowsIsAnInternalError)
+{
+    operations.work = [](const Message&, const Caller&) { throw std::runtime_error("oh"); };
+    const HttpReply reply = ask(post());
+    EXPECT_EQ(reply.status, 500);
+    EXPECT_EQ(reply.body, "the request failed; the log tells why\n");
+}
+
+TEST_F(RequestTest, OperationWithoutMemoryEndsItsConnectionOnly)
+{
+    operations.work = [](const Message&, const Caller&) { throw std::bad_alloc(); };
+    HttpClient client = connect();
+    client.send(post());
+    EXPECT_TRUE(client.isClosed());
+    operations.work = nullptr;
+    EXPECT_EQ(ask(post()).status, 200);
+}
+
+} // namespace
+
+} // namespace HttpTests
