@@ -1,5 +1,5 @@
 # Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
-# shellcheck shell=bash
+# shellcheck shell=bash disable=SC2034
 
 # The Debian packages that building and checking needs, and their installation. Sourced by
 # `run` and `check`.

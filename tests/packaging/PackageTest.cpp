@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The Debian packages, and the scripts that go into them.
+// The Debian packages, and the shell scripts.
 
 #include "tests/support/ExportedNames.h"
 #include "tests/support/TemporaryFolder.h"
@@ -70,12 +70,13 @@ TEST_F(Packages, haveTheVersionOfTheirLogOfChanges)
     }
 }
 
+// Those of the whole source tree.
 TEST(Scripts, areFreeOfWarnings)
 {
-    const std::string complaints =
-        outputOf("cd '" + packaging +
-                 "' && shellcheck sensor-profile-register sensorctl.bash debian/postinst "
-                 "debian/prerm debian/postrm 2>&1 && echo passed");
+    const std::string complaints = outputOf(
+        "cd '" SENSOR_PROFILE_SOURCE_DIR "' && "
+        "grep -rlE --exclude-dir=build --exclude-dir=.git '^#!/(usr/)?bin/(env bash|sh)' . | "
+        "xargs shellcheck scripts/packages.sh packaging/sensorctl.bash 2>&1 && echo passed");
     EXPECT_EQ(complaints, "passed\n");
 }
 
