@@ -107,7 +107,10 @@ std::string Address::host() const
 
 std::string Address::text() const
 {
-    return (isIpv6() ? "[" + host() + "]" : host()) + ":" + std::to_string(port());
+    std::string text = host();
+    if (isIpv6())
+        text = std::string("[").append(text).append("]");
+    return text.append(":").append(std::to_string(port()));
 }
 
 std::string Address::neighbourhood() const

@@ -47,13 +47,15 @@ void checkOperation(const RequestHead& head, const std::string& prefix)
             "unsupported-protocol-version");
 }
 
-std::optional<int> hexadecimalDigit(char c)
+// What two hexadecimal digits say.
+std::optional<char> octet(std::string_view digits)
 {
-    int value = 0;
-    const auto [end, error] = std::from_chars(&c, &c + 1, value, 16);
-    if (error != std::errc{} || end != &c + 1)
+    unsigned value = 0;
+    const char* const end = digits.data() + digits.size();
+    const auto [stop, error] = std::from_chars(digits.data(), end, value, 16);
+    if (digits.size() != 2 || error != std::errc{} || stop != end)
         return std::nullopt;
-    return value;
+    return static_cast<char>(value);
 }
 
 // With the octets that stand behind percent signs.
@@ -65,12 +67,11 @@ std::string decoded(std::string_view text, const std::string& name)
             result += text[i];
             continue;
         }
-        const auto high = i + 2 < text.size() ? hexadecimalDigit(text[i + 1]) : std::nullopt;
-        const auto low = high ? hexadecimalDigit(text[i + 2]) : std::nullopt;
-        if (!low)
+        const auto hidden = octet(text.substr(i + 1, 2));
+        if (!hidden)
             throw HttpError(Status::badRequest,
                 "the header field " + name + " holds a percent sign without two digits", mismatch);
-        result += static_cast<char>(*high * 16 + *low);
+        result += *hidden;
         i += 2;
     }
     return result;
