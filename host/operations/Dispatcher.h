@@ -23,6 +23,7 @@ public:
         const OperationLimits& limits = {},
         OpenEnumerations::Clock clock = std::chrono::steady_clock::now);
 
+    // REQUIRES: no request is active on this thread.
     // A failure is answered with the code of the Refusal it ends in; codes that are none of the
     // protocol's become CIM_ERR_FAILED.
     std::unique_ptr<CimXml::Answer> answer(

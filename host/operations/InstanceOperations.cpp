@@ -8,6 +8,7 @@
 #include "host/broker/Refusal.h"
 #include "host/broker/Request.h"
 #include "host/manager/Manager.h"
+#include "host/operations/KnownClass.h"
 #include "host/operations/Selections.h"
 #include "host/operations/WholeResult.h"
 #include "host/repository/Repository.h"
@@ -62,20 +63,20 @@ void InstanceOperations::enumerateNames(
 void InstanceOperations::getProperty(
     const Operation& operation, Request& request, AnswerObjects& found) const
 {
-    checkProperty(operation);
-    PropertyNames properties(std::vector{operation.propertyName});
+    const std::string& name = propertyOf(operation);
+    PropertyNames properties(name);
     const Instance& instance =
         manager_.getInstance(request.context(), *operation.path, properties.get());
-    const Value* const value = instance.property(operation.propertyName);
+    const Value* const value = instance.property(name);
     found.add(value == nullptr ? Value() : *value);
 }
 
 void InstanceOperations::setProperty(const Operation& operation, Request& request) const
 {
-    checkProperty(operation);
+    const std::string& name = propertyOf(operation);
     Instance& changed = request.makeInstance(*operation.path);
-    changed.setProperty(operation.propertyName, operation.newValue);
-    PropertyNames properties(std::vector{operation.propertyName});
+    changed.setProperty(name, operation.newValue);
+    PropertyNames properties(name);
     manager_.modifyInstance(request.context(), *operation.path, changed, properties.get());
 }
 
@@ -110,14 +111,15 @@ void InstanceOperations::query(
     });
 }
 
-void InstanceOperations::checkProperty(const Operation& operation) const
+const std::string& InstanceOperations::propertyOf(const Operation& operation) const
 {
-    const ClassDeclaration* const declared =
-        classes_.findClass(operation.nameSpace, operation.className);
-    // The manager complains of a class that is not known.
-    if (declared != nullptr && declared->property(operation.propertyName) == nullptr)
+    const ClassDeclaration& declared =
+        knownClass(classes_, operation.nameSpace, operation.className);
+    const PropertyDeclaration* const property = declared.property(operation.propertyName);
+    if (property == nullptr)
         throw Refusal(CMPI_RC_ERR_NO_SUCH_PROPERTY,
-            "class " + declared->name + " has no property " + operation.propertyName);
+            "class " + declared.name + " has no property " + operation.propertyName);
+    return property->name;
 }
 
 } // namespace Host

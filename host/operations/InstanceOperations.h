@@ -43,7 +43,8 @@ public:
     void query(const CimXml::Operation& operation, Request& request, AnswerObjects& found) const;
 
 private:
-    void checkProperty(const CimXml::Operation& operation) const;
+    // The name as it is declared.
+    const std::string& propertyOf(const CimXml::Operation& operation) const;
 
     const Repository& classes_;
     Manager& manager_;

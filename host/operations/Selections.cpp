@@ -26,6 +26,17 @@ bool leavesOutSubclasses(const Operation& operation)
            !operation.deepInheritance;
 }
 
+// As the first class has it that has such a property: not every provider knows a name that is
+// spelled otherwise. What no class has stays as it is, and selects nothing.
+void spellAsDeclared(const Namespace& nameSpace, std::string& name)
+{
+    for (const auto& declared : nameSpace.classes())
+        if (const PropertyDeclaration* const property = declared->property(name)) {
+            name = property->name;
+            return;
+        }
+}
+
 // The properties of the class that are selected.
 void limitTo(const ClassDeclaration& declared, PropertySelection& selection)
 {
@@ -43,6 +54,9 @@ PropertySelection effectiveSelection(const Operation& operation, const Repositor
     PropertySelection selection = operation.selection;
     if (!isOfClasses(operation.kind))
         selection.localOnly = false;
+    if (selection.properties)
+        for (std::string& name : *selection.properties)
+            spellAsDeclared(*classes.findNamespace(operation.nameSpace), name);
     if (leavesOutSubclasses(operation)) {
         const auto* const declared = classes.findClass(operation.nameSpace, operation.className);
         // Without subclasses there is nothing to leave out.

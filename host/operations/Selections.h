@@ -16,10 +16,11 @@ namespace Host {
 
 class Repository;
 
-// The operation's own, with two differences for operations on instances. LocalOnly is put aside,
-// as the standard recommends: a client that leaves the flag to its default would get next to
-// nothing of an object whose class inherits much. And where DeepInheritance is false, the list is
-// no longer than the named class.
+// The operation's own, its properties spelled as they are declared, with two differences for
+// operations on instances. LocalOnly is put aside, as the standard recommends: a client that
+// leaves the flag to its default would get next to nothing of an object whose class inherits
+// much. And where DeepInheritance is false, the list is no longer than the named class.
+// REQUIRES: the operation's namespace is known.
 CimXml::PropertySelection effectiveSelection(
     const CimXml::Operation& operation, const Repository& classes);
 
@@ -30,6 +31,9 @@ CMPIFlags flagsOf(const CimXml::Operation& operation);
 class PropertyNames {
 public:
     explicit PropertyNames(const std::optional<std::vector<std::string>>& names);
+    explicit PropertyNames(std::optional<std::vector<std::string>>&&) = delete;
+    // Of one property.
+    explicit PropertyNames(const std::string& name) : names_{name.c_str(), nullptr} {}
 
     // Ends with a null; null for all properties.
     const char** get() { return names_.empty() ? nullptr : names_.data(); }

@@ -1,0 +1,233 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// What providers are told of an operation, and what becomes of their success.
+
+#include "host/broker/Context.h"
+#include "host/broker/Instance.h"
+#include "host/broker/ObjectPath.h"
+#include "tests/host/operations/ScriptedManager.h"
+
+#include <vector>
+
+namespace OperationTests {
+
+namespace {
+
+using testing::ElementsAre;
+using testing::HasSubstr;
+
+std::string entry(const ProviderCall& asked, const char* name)
+{
+    const Host::NamedValue* const found = Host::Context::of(asked.context)->entries().find(name);
+    return found == nullptr ? "none" : std::string(*found->value.text());
+}
+
+unsigned flags(const ProviderCall& asked)
+{
+    const auto& entries = Host::Context::of(asked.context)->entries();
+    return static_cast<unsigned>(*entries.find(CMPIInvocationFlags)->value.unsignedInteger());
+}
+
+std::vector<std::string> listed(const char** names)
+{
+    if (names == nullptr)
+        return {"all"};
+    std::vector<std::string> list;
+    for (; *names != nullptr; ++names)
+        list.emplace_back(*names);
+    return list;
+}
+
+std::string list(const std::vector<std::string>& names)
+{
+    std::string values;
+    for (const std::string& name : names)
+        values += "<VALUE>" + name + "</VALUE>";
+    return parameter("PropertyList", "<VALUE.ARRAY>" + values + "</VALUE.ARRAY>");
+}
+
+class DispatcherTest : public testing::Test {
+protected:
+    // Lets the test look at what the provider is called with.
+    void onThings(const std::function<void(const ProviderCall&)>& look)
+    {
+        manager_.script("Things", [this, look](const ProviderCall& asked) {
+            look(asked);
+            ++calls_;
+            return manager_.deliver(asked, "Thing", "a");
+        });
+    }
+
+    std::string ask(
+        const std::string& operation, const std::string& parameters = {}, const Caller& caller = {})
+    {
+        const std::string answer = answerTo(*manager_, call(operation, parameters), caller);
+        EXPECT_EQ(errorIn(answer), "");
+        return answer;
+    }
+
+    ScriptedManager manager_;
+    int calls_ = 0;
+    const std::string ofThing_ = classOf("ClassName", "Thing");
+};
+
+TEST_F(DispatcherTest, providersLearnWhoAsksForWhatNamespaceInWhichLanguage)
+{
+    onThings([](const ProviderCall& asked) {
+        EXPECT_EQ(entry(asked, CMPIPrincipal), "somebody");
+        EXPECT_EQ(entry(asked, CMPIAcceptLanguage), "de, en");
+        EXPECT_EQ(entry(asked, CMPIInitNameSpace), "root/test");
+    });
+    ask("EnumerateInstanceNames", ofThing_, {"somebody", "127.0.0.1", "de, en"});
+    EXPECT_EQ(calls_, 1);
+}
+
+TEST_F(DispatcherTest, whatIsNotKnownOfTheCallerIsLeftOut)
+{
+    onThings([](const ProviderCall& asked) {
+        EXPECT_EQ(entry(asked, CMPIPrincipal), "none");
+        EXPECT_EQ(entry(asked, CMPIAcceptLanguage), "none");
+    });
+    ask("EnumerateInstanceNames", ofThing_);
+    EXPECT_EQ(calls_, 1);
+}
+
+TEST_F(DispatcherTest, flagsAreThoseOfTheOperationWithoutLocalOnly)
+{
+    std::vector<unsigned> seen;
+    onThings([&seen](const ProviderCall& asked) { seen.push_back(flags(asked)); });
+    ask("EnumerateInstances", ofThing_);
+    ask("EnumerateInstances", ofThing_ + valueOf("DeepInheritance", "FALSE"));
+    ask("EnumerateInstances",
+        ofThing_ + valueOf("IncludeQualifiers", "TRUE") + valueOf("IncludeClassOrigin", "TRUE"));
+    ask("GetInstance", parameter("InstanceName", thing()) + valueOf("LocalOnly", "TRUE"));
+    EXPECT_THAT(seen,
+        ElementsAre(CMPI_FLAG_DeepInheritance, 0U,
+            CMPI_FLAG_DeepInheritance | CMPI_FLAG_IncludeQualifiers | CMPI_FLAG_IncludeClassOrigin,
+            0U));
+}
+
+TEST_F(DispatcherTest, propertyListsArriveSpelledAsDeclared)
+{
+    std::vector<std::vector<std::string>> seen;
+    onThings([&seen](const ProviderCall& asked) { seen.push_back(listed(asked.properties)); });
+    const std::string name = parameter("InstanceName", thing());
+    ask("GetInstance", name);
+    ask("GetInstance", name + list({}));
+    ask("GetInstance", name + list({"label", "Unheard"}));
+    ask("GetProperty", name + valueOf("PropertyName", "ISON"));
+    EXPECT_THAT(seen, ElementsAre(ElementsAre("all"), ElementsAre(),
+                          ElementsAre("Label", "Unheard"), ElementsAre("IsOn")));
+}
+
+TEST_F(DispatcherTest, withoutDeepInheritanceTheListEndsWithTheClass)
+{
+    std::vector<std::vector<std::string>> seen;
+    onThings([&seen](const ProviderCall& asked) { seen.push_back(listed(asked.properties)); });
+    const std::string flat = ofThing_ + valueOf("DeepInheritance", "FALSE");
+    ask("EnumerateInstances", flat);
+    ask("EnumerateInstances", flat + list({"Percent", "Label"}));
+    ask("OpenEnumerateInstances", flat + list({"Percent"}) + valueOf("MaxObjectCount", "1"));
+    EXPECT_THAT(seen,
+        ElementsAre(ElementsAre("Name", "Index", "Label", "IsOn", "Levels", "Since", "Reading"),
+            ElementsAre("Label"), ElementsAre()));
+}
+
+TEST_F(DispatcherTest, aClassWithoutSubclassesLeavesNothingOut)
+{
+    manager_.script("Gauges", [this](const ProviderCall& asked) {
+        EXPECT_EQ(asked.properties, nullptr);
+        ++calls_;
+        return Ok;
+    });
+    ask("EnumerateInstances", classOf("ClassName", "Gauge") + valueOf("DeepInheritance", "FALSE"));
+    EXPECT_EQ(calls_, 1);
+}
+
+TEST_F(DispatcherTest, theFiltersOfAssociationsArrive)
+{
+    manager_.script("Links", [this](const ProviderCall& asked) {
+        EXPECT_STREQ(asked.role, "Owner");
+        if (asked.operation.starts_with("associator")) {
+            EXPECT_STREQ(asked.resultRole, "Part");
+        }
+        ++calls_;
+        return Ok;
+    });
+    const std::string source = thing();
+    const std::string associators = classOf("AssocClass", "Link") + valueOf("Role", "Owner") +
+                                    valueOf("ResultRole", "Part") +
+                                    classOf("ResultClass", "Single");
+    const std::string references = classOf("ResultClass", "Link") + valueOf("Role", "Owner");
+    for (const char* const operation : {"Associators", "AssociatorNames"})
+        ask(operation, parameter("ObjectName", source) + associators);
+    for (const char* const operation : {"OpenAssociatorInstances", "OpenAssociatorInstancePaths"})
+        ask(operation, parameter("InstanceName", source) + associators);
+    for (const char* const operation : {"References", "ReferenceNames"})
+        ask(operation, parameter("ObjectName", source) + references);
+    for (const char* const operation : {"OpenReferenceInstances", "OpenReferenceInstancePaths"})
+        ask(operation, parameter("InstanceName", source) + references);
+    EXPECT_EQ(calls_, 8);
+}
+
+TEST_F(DispatcherTest, whatWasMadeIsAnsweredByItsPath)
+{
+    manager_.script("Things", [this](const ProviderCall& asked) {
+        EXPECT_EQ(asked.operation, "createInstance");
+        EXPECT_EQ(Host::ObjectPath::of(asked.path)->key("Name")->text(), "new");
+        // A path is what a provider answers here.
+        return manager_.deliver({.operation = "Name", .result = asked.result}, "Thing", "new");
+    });
+    EXPECT_THAT(ask("CreateInstance",
+                    parameter("NewInstance", "<INSTANCE CLASSNAME=\"Thing\"><PROPERTY "
+                                             "NAME=\"Name\" TYPE=\"string\"><VALUE>new</VALUE>"
+                                             "</PROPERTY></INSTANCE>")),
+        HasSubstr("<IRETURNVALUE><INSTANCENAME CLASSNAME=\"Thing\">"));
+}
+
+TEST_F(DispatcherTest, successWithoutObjectsIsAnEmptyAnswer)
+{
+    std::vector<std::string> seen;
+    manager_.script("Things", [&seen](const ProviderCall& asked) {
+        seen.push_back(asked.operation);
+        return Ok;
+    });
+    const std::string name = parameter("InstanceName", thing());
+    EXPECT_THAT(ask("DeleteInstance", name),
+        HasSubstr("<IMETHODRESPONSE NAME=\"DeleteInstance\"></IMETHODRESPONSE>"));
+    EXPECT_THAT(ask("ModifyInstance",
+                    parameter("ModifiedInstance", "<VALUE.NAMEDINSTANCE>" + thing() +
+                                                      "<INSTANCE CLASSNAME=\"Thing\"></INSTANCE>"
+                                                      "</VALUE.NAMEDINSTANCE>")),
+        HasSubstr("<IMETHODRESPONSE NAME=\"ModifyInstance\"></IMETHODRESPONSE>"));
+    EXPECT_THAT(ask("EnumerateInstances", ofThing_), HasSubstr("<IRETURNVALUE></IRETURNVALUE>"));
+    EXPECT_THAT(seen, ElementsAre("deleteInstance", "modifyInstance", "enumerateInstances"));
+}
+
+TEST_F(DispatcherTest, settingAPropertyModifiesThatOneAlone)
+{
+    manager_.script("Things", [this](const ProviderCall& asked) {
+        EXPECT_EQ(asked.operation, "modifyInstance");
+        EXPECT_THAT(listed(asked.properties), ElementsAre("Label"));
+        ++calls_;
+        return Ok;
+    });
+    EXPECT_THAT(ask("SetProperty", parameter("InstanceName", thing()) +
+                                       valueOf("PropertyName", "label") + valueOf("NewValue", "b")),
+        HasSubstr("<IMETHODRESPONSE NAME=\"SetProperty\"></IMETHODRESPONSE>"));
+    EXPECT_EQ(calls_, 1);
+}
+
+TEST_F(DispatcherTest, aPathWithoutHostGetsTheManagersAndItsNamespace)
+{
+    manager_.deliverThings(1);
+    const std::string answer =
+        ask("OpenEnumerateInstancePaths", ofThing_ + valueOf("MaxObjectCount", "5"));
+    EXPECT_THAT(answer, HasSubstr("<NAMESPACEPATH><HOST>host.example</HOST><LOCALNAMESPACEPATH>"
+                                  "<NAMESPACE NAME=\"root\"></NAMESPACE>"
+                                  "<NAMESPACE NAME=\"test\"></NAMESPACE>"));
+}
+
+} // namespace
+
+} // namespace OperationTests

@@ -1,0 +1,40 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// The object manager as it is shipped, on a small machine.
+
+#pragma once
+
+#include "host/manager/SensorProfile.h"
+#include "host/operations/ObjectManager.h"
+#include "tests/host/operations/OperationsTest.h"
+#include "tests/support/Environment.h"
+#include "tests/support/ShippedClasses.h"
+
+namespace OperationTests {
+
+class ShippedManager {
+public:
+    explicit ShippedManager(const Host::OperationLimits& limits = {})
+        : manager_(classes(),
+              Host::sensorProfileProviders(SENSOR_PROFILE_BINARY_DIR
+                  "/lib/libSensorProfileProvider.so",
+                  SENSOR_PROFILE_BINARY_DIR "/lib/libComputerSystemProvider.so"),
+              "host.example", limits)
+    {
+    }
+
+    OperationHandler& operator*() { return manager_; }
+
+private:
+    static const Host::Repository& classes()
+    {
+        static const auto compiled = Testing::shippedClasses();
+        return *compiled;
+    }
+
+    Testing::EnvironmentVariable machine_{"VORN_INSTRUMENTATION",
+        "model:" SENSOR_PROFILE_SOURCE_DIR "/tests/data/cimxml/machine.json"};
+    Host::ObjectManager manager_;
+};
+
+} // namespace OperationTests
