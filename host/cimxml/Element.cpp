@@ -119,12 +119,12 @@ void Element::fail(std::string_view why, Outcome outcome) const
         std::string(name()).append(": ").append(why));
 }
 
-Document::Document(std::string_view text) : text_(text)
+Document::Document(std::string_view text, std::size_t maximumDepth) : text_(text)
 {
     static constexpr std::string_view byteOrderMark = "\xEF\xBB\xBF";
     if (text_.starts_with(byteOrderMark))
         text_.erase(0, byteOrderMark.size());
-    requireWellFormed(text_);
+    requireWellFormed(text_, maximumDepth);
     // White space may be all of a value.
     const pugi::xml_parse_result result = tree_.load_buffer(text_.data(), text_.size(),
         pugi::parse_default | pugi::parse_ws_pcdata, pugi::encoding_utf8);

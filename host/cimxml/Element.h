@@ -8,6 +8,7 @@
 
 #include <pugixml.hpp>
 
+#include <cstddef>
 #include <initializer_list>
 #include <optional>
 #include <string>
@@ -51,7 +52,7 @@ private:
 // A text as a tree of elements. Throws RequestError when requireWellFormed does.
 class Document {
 public:
-    explicit Document(std::string_view text);
+    Document(std::string_view text, std::size_t maximumDepth);
 
     Element root() const { return {tree_.document_element(), text_}; }
 

@@ -103,7 +103,8 @@ std::string nameSpaceOf(const Element& localNameSpacePath)
     return all;
 }
 
-Message::Message(std::string_view body) : document_(std::make_unique<const Document>(body))
+Message::Message(std::string_view body, std::size_t maximumDepth)
+    : document_(std::make_unique<const Document>(body, maximumDepth))
 {
     const Element message = messageOf(document_->root());
     id_ = message.attribute("ID");

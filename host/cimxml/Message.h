@@ -4,6 +4,8 @@
 
 #pragma once
 
+#include "host/cimxml/WellFormed.h"
+
 #include <memory>
 #include <string>
 #include <string_view>
@@ -16,8 +18,9 @@ class Document;
 // caller's to bound.
 class Message {
 public:
-    // Throws RequestError for what is no such call, with the outcome to answer.
-    explicit Message(std::string_view body);
+    // Throws RequestError for what is no such call, with the outcome to answer. Elements may stand
+    // so deep in one another.
+    explicit Message(std::string_view body, std::size_t maximumDepth = MaximumDepth);
     ~Message();
     Message(Message&&) noexcept;
     Message& operator=(Message&&) noexcept;

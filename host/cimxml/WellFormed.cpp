@@ -30,7 +30,10 @@ constexpr bool continuesName(char c)
 
 class Scanner {
 public:
-    explicit Scanner(std::string_view text) : text_(text) {}
+    Scanner(std::string_view text, std::size_t maximumDepth)
+        : text_(text), maximumDepth_(maximumDepth)
+    {
+    }
 
     void run()
     {
@@ -231,8 +234,8 @@ private:
         if (++elements_ > MaximumElements)
             fail("more than " + std::to_string(MaximumElements) + " elements",
                 Outcome::requestNotValid);
-        if (open_.size() == MaximumDepth)
-            fail("elements more than " + std::to_string(MaximumDepth) + " deep in one another",
+        if (open_.size() == maximumDepth_)
+            fail("elements more than " + std::to_string(maximumDepth_) + " deep in one another",
                 Outcome::requestNotValid);
         ++at_;
         open_.push_back(name());
@@ -273,6 +276,7 @@ private:
     }
 
     std::string_view text_;
+    std::size_t maximumDepth_;
     std::size_t at_ = 0;
     std::size_t elements_ = 0;
     std::vector<std::string_view> open_;
@@ -280,9 +284,9 @@ private:
 
 } // namespace
 
-void requireWellFormed(std::string_view text)
+void requireWellFormed(std::string_view text, std::size_t maximumDepth)
 {
-    Scanner(text).run();
+    Scanner(text, maximumDepth).run();
 }
 
 } // namespace Host::CimXml

@@ -9,7 +9,7 @@
 
 namespace Host::CimXml {
 
-inline constexpr std::size_t MaximumDepth = 64;
+inline constexpr std::size_t MaximumDepth = 64; // where nobody says otherwise
 inline constexpr std::size_t MaximumElements = 100'000;
 inline constexpr std::size_t MaximumAttributes = 16; // of one element
 
@@ -17,6 +17,6 @@ inline constexpr std::size_t MaximumAttributes = 16; // of one element
 // entities are the five predefined ones, and nothing can expand. Takes time in proportion to the
 // text. Throws RequestError: requestNotWellFormed, or requestNotValid for a document type and
 // beyond the bounds.
-void requireWellFormed(std::string_view text);
+void requireWellFormed(std::string_view text, std::size_t maximumDepth = MaximumDepth);
 
 } // namespace Host::CimXml

@@ -207,7 +207,7 @@ void Exchange::work() noexcept
 
 void Exchange::carryOut()
 {
-    const CimXml::Message message(body_);
+    const CimXml::Message message(body_, service_.limits.maximumDepth);
     body_.clear();
     body_.shrink_to_fit();
     requireMatch(head_, message);

@@ -12,6 +12,8 @@ struct Limits {
     std::size_t maximumBody = std::size_t{1} << 20;    // bytes of a request
     std::size_t maximumHeader = std::size_t{16} << 10; // bytes of its first line and its fields
 
+    std::size_t maximumDepth = 64; // of elements in one another
+
     std::size_t maximumConnections = 256;
     std::size_t maximumConnectionsPerAddress = 64; // an IPv6 network of 64 bits is one address
 
