@@ -82,11 +82,11 @@ TEST_F(PullTest, theSelectionIsThatOfTheOpening)
 
 TEST_F(PullTest, onlyWhoOpenedItMayPull)
 {
-    const std::string context = contextIn(open(0, {}, {.principal = "anna", .address = "a"}));
-    EXPECT_THAT(errorIn(pull(context, 1, {.principal = "bert", .address = "a"})), StartsWith("21"));
+    const std::string context = contextIn(open(0, {}, {"anna", "a", {}}));
+    EXPECT_THAT(errorIn(pull(context, 1, {"bert", "a", {}})), StartsWith("21"));
     EXPECT_THAT(errorIn(pull(context, 1)), StartsWith("21"));
     // From wherever.
-    EXPECT_EQ(errorIn(pull(context, 1, {.principal = "anna", .address = "b"})), "");
+    EXPECT_EQ(errorIn(pull(context, 1, {"anna", "b", {}})), "");
 }
 
 TEST_F(PullTest, itIsOpenAsLongAsWasAskedFor)
