@@ -16,19 +16,28 @@ namespace {
 // Rounded to double first it would be 3300.
 static_assert(std::numeric_limits<long double>::digits >= 64);
 
-std::int32_t truncated(long double product)
+template <typename Number>
+std::int32_t truncated(Number product)
 {
     constexpr std::int32_t OutOfRange = std::numeric_limits<std::int32_t>::min();
-    constexpr long double Above = 2147483648.0L;
-    constexpr long double Below = -2147483649.0L;
+    constexpr Number Above = 2147483648.0;
+    constexpr Number Below = -2147483649.0;
     if (product > Below && product < Above) // false for what is not a number
         return static_cast<std::int32_t>(product);
     return OutOfRange;
 }
 
-std::vector<std::uint16_t> withThresholdCodes(std::vector<std::uint16_t>& codes)
+template <typename Element, typename List>
+void appendTimes(std::vector<Element>& elements, const List& list, unsigned times)
 {
-    codes.insert(codes.end(), ThresholdCodes.begin(), ThresholdCodes.end());
+    for (; times != 0; --times)
+        elements.insert(elements.end(), list.begin(), list.end());
+}
+
+std::vector<std::uint16_t> thresholdCodes(unsigned times)
+{
+    std::vector<std::uint16_t> codes;
+    appendTimes(codes, ThresholdCodes, times);
     return codes;
 }
 
@@ -46,9 +55,11 @@ std::string Sensor::getElementName() const
 
 std::vector<std::string> Sensor::getPossibleStates()
 {
-    for (const char* const label : FixedStateLabels)
-        possibleStates_.append(label);
-    return possibleStates_.as<std::string>();
+    std::vector<std::string> labels;
+    for (const unsigned status : possibleStates_)
+        labels.emplace_back(StateLabels[status]);
+    appendTimes(labels, FixedStateLabels, ++fixedStateLabels_);
+    return labels;
 }
 
 std::uint16_t Sensor::getRateUnits()
@@ -59,12 +70,12 @@ std::uint16_t Sensor::getRateUnits()
 
 std::vector<std::uint16_t> Sensor::getSupportedThresholds()
 {
-    return withThresholdCodes(supportedThresholds_);
+    return thresholdCodes(++supportedThresholds_);
 }
 
 std::vector<std::uint16_t> Sensor::getSettableThresholds()
 {
-    return withThresholdCodes(settableThresholds_);
+    return thresholdCodes(++settableThresholds_);
 }
 
 bool Sensor::setDeviceID(std::string deviceID)
@@ -136,21 +147,27 @@ bool Sensor::setCurrentState(unsigned nodeStatus)
 
 bool Sensor::setOperationalStatus(unsigned nodeStatus)
 {
-    operationalStatus_.append(OperationalStatuses[nodeStatus]);
+    operationalStatus_.push_back(OperationalStatuses[nodeStatus]);
     return true;
 }
 
 bool Sensor::setPossibleStates(std::vector<unsigned> nodeStatuses)
 {
+    constexpr unsigned Unknown = 0; // without a label of its own, as what is too large
+    constexpr unsigned Largest = std::numeric_limits<Codes::value_type>::max();
     possibleStates_.clear();
+    fixedStateLabels_ = 0;
     for (const unsigned status : nodeStatuses)
-        possibleStates_.append(StateLabels[status]);
+        possibleStates_.push_back(
+            static_cast<Codes::value_type>(status <= Largest ? status : Unknown));
     return true;
 }
 
 bool Sensor::storeScaled(std::int32_t& field, double value) const
 {
-    field = truncated(static_cast<long double>(value) * readingMultiplier_);
+    field = readingMultiplier_ == 1.0 // the common case, and several times as fast
+                ? truncated(value)
+                : truncated(static_cast<long double>(value) * readingMultiplier_);
     return true;
 }
 

@@ -2,8 +2,6 @@
 
 #pragma once
 
-#include "model/ShortList.h"
-
 #include <cstdint>
 #include <string>
 #include <vector>
@@ -47,7 +45,7 @@ public:
     std::int32_t getUpperThresholdFatal() const { return upperThresholdFatal_; }
     std::vector<std::uint16_t> getOperationalStatus() const
     {
-        return operationalStatus_.as<std::uint16_t>();
+        return {operationalStatus_.begin(), operationalStatus_.end()};
     }
     std::vector<std::uint16_t> getSupportedThresholds(); // appends 0 to 5
     std::vector<std::uint16_t> getSettableThresholds();  // appends 0 to 5
@@ -78,21 +76,28 @@ private:
     // In base units times the multiplier, truncated toward zero.
     bool storeScaled(std::int32_t& field, double value) const;
 
-    // Labels are those of the value tables, which live as long as the process: a machine has
-    // many sensors and few labels.
+    // A machine may have many thousand sensors, so a record is kept small. A string holds a few
+    // codes in itself, where a vector would be a piece of the heap for each; lists that always
+    // grow by the same elements are numbers of times; and labels are those of the value tables,
+    // which live as long as the process.
+    using Codes = std::u16string;
+
     std::string deviceID_;
-    const char* currentState_ = "";
     std::string elementName_;
-    ShortList<const char*, 3> possibleStates_;
+    Codes possibleStates_; // node statuses
+    Codes operationalStatus_;
+    const char* currentState_ = "";
+    const char* healthStatus_ = "";
+    double readingMultiplier_ = 1.0;
     std::uint16_t baseUnits_ = 0;
     std::uint16_t rateUnits_ = 0;
-    std::vector<std::uint16_t> supportedThresholds_;
-    std::vector<std::uint16_t> settableThresholds_;
+    std::uint32_t fixedStateLabels_ = 0;    // how many times they follow the possible states
+    std::uint32_t supportedThresholds_ = 0; // how many times 0 to 5
+    std::uint32_t settableThresholds_ = 0;  // the same
     std::uint16_t sensorType_ = 0;
     std::uint16_t enabledState_ = 0;
     std::uint16_t requestedState_ = 0;
     std::uint16_t healthState_ = 0;
-    const char* healthStatus_ = "";
     std::int32_t currentReading_ = 0;
     std::int32_t unitModifier_ = 0;
     std::int32_t lowerThresholdNonCritical_ = 0;
@@ -101,8 +106,6 @@ private:
     std::int32_t upperThresholdCritical_ = 0;
     std::int32_t lowerThresholdFatal_ = 0;
     std::int32_t upperThresholdFatal_ = 0;
-    double readingMultiplier_ = 1.0;
-    ShortList<std::uint16_t, 1> operationalStatus_;
 };
 
 } // namespace Vorn::SensorProfileProvider

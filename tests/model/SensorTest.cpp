@@ -212,8 +212,9 @@ Labels withFixedLabels(Labels labels)
 TEST(Sensor, possibleStatesAreTheirLabelsAndThenTheFixedOnes)
 {
     Sensor sensor;
-    EXPECT_TRUE(sensor.setPossibleStates({1, 99, 25}));
-    EXPECT_EQ(sensor.getPossibleStates(), withFixedLabels({"Normal", "Unknown", "CriticalLow"}));
+    EXPECT_TRUE(sensor.setPossibleStates({1, 99, 25, 65536 + 25}));
+    EXPECT_EQ(sensor.getPossibleStates(),
+        withFixedLabels({"Normal", "Unknown", "CriticalLow", "Unknown"}));
 }
 
 TEST(Sensor, eachPossibleStateHasTheLabelOfTheCurrentState)
