@@ -39,6 +39,7 @@ Dispatcher::Dispatcher(const Repository& classes, Manager& manager, std::string 
 std::unique_ptr<CimXml::Answer> Dispatcher::answer(
     const CimXml::Message& message, const CimXml::Caller& caller)
 {
+    pulls_.removeExpired();
     try {
         return carryOut(message, caller);
     } catch (const Refusal& refusal) {

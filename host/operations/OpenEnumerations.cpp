@@ -95,6 +95,13 @@ void OpenEnumerations::close(const std::string& context, const EnumerationOwner&
     remove(found, removed);
 }
 
+void OpenEnumerations::removeExpired()
+{
+    Removed removed;
+    const std::lock_guard lock(mutex_);
+    removeExpired(removed);
+}
+
 void OpenEnumerations::removeExpired(Removed& removed)
 {
     const Time now = clock_();

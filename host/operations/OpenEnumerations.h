@@ -38,8 +38,9 @@ struct OpenEnumeration {
 // May be used from any thread. Operations on one enumeration come one after another; what they
 // hand out is read without the lock.
 //
-// Enumerations whose time is over go with the next operation on any of them, whichever it is:
-// then they are not found. Where no client comes any more, the last ones stay, within the limits.
+// Enumerations whose time is over are never found again, but their memory is given back only with
+// the next call, whichever it is: where no client comes any more, the last ones stay, within the
+// limits.
 class OpenEnumerations {
 public:
     using Clock = std::function<std::chrono::steady_clock::time_point()>;
@@ -63,6 +64,9 @@ public:
     Pulled pull(const std::string& context, const EnumerationOwner& owner, std::size_t count);
     // Whatever the owner pulls.
     void close(const std::string& context, const EnumerationOwner& owner);
+
+    // For calls that have to do with none of them.
+    void removeExpired();
 
 private:
     using Time = std::chrono::steady_clock::time_point;

@@ -35,6 +35,9 @@ public:
         CimXml::Operation& operation, const std::string& principal, AnswerObjects& found);
     void close(const CimXml::Operation& operation, const std::string& principal);
 
+    // Gives back the memory of enumerations whose time is over; to be called with all operations.
+    void removeExpired() { enumerations_.removeExpired(); }
+
 private:
     std::size_t countFor(const CimXml::Operation& operation) const;
 

@@ -196,8 +196,11 @@ TEST_F(OpenEnumerationsTest, memoryGoesWithTheTime)
     AnswerObjects made(std::move(memory));
     made.add(ClassName{"x"});
     enumerations_.open({Owner, std::move(made), {}, 10s});
-    now_ += 11s;
-    open(1); // any operation
+    now_ += 9s;
+    enumerations_.removeExpired();
+    EXPECT_FALSE(watched.expired());
+    now_ += 1s;
+    enumerations_.removeExpired();
     EXPECT_TRUE(watched.expired());
 }
 

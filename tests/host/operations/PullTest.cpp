@@ -4,6 +4,8 @@
 
 #include "tests/host/operations/ScriptedManager.h"
 
+#include <memory_resource>
+
 namespace OperationTests {
 
 namespace {
@@ -12,6 +14,34 @@ using namespace std::chrono_literals;
 using testing::StartsWith;
 
 constexpr std::string_view InstanceElement = "<VALUE.INSTANCEWITHPATH>";
+
+// What arenas take while it lives.
+class CountedMemory : public std::pmr::memory_resource {
+public:
+    CountedMemory() : before_(std::pmr::set_default_resource(this)) {}
+    ~CountedMemory() override { std::pmr::set_default_resource(before_); }
+
+    std::size_t taken() const { return taken_; }
+
+private:
+    void* do_allocate(std::size_t size, std::size_t alignment) override
+    {
+        taken_ += size;
+        return before_->allocate(size, alignment);
+    }
+    void do_deallocate(void* block, std::size_t size, std::size_t alignment) override
+    {
+        taken_ -= size;
+        before_->deallocate(block, size, alignment);
+    }
+    bool do_is_equal(const memory_resource& other) const noexcept override
+    {
+        return this == &other;
+    }
+
+    std::pmr::memory_resource* before_;
+    std::size_t taken_ = 0;
+};
 
 class PullTest : public testing::Test {
 protected:
@@ -36,6 +66,7 @@ protected:
             caller);
     }
 
+    CountedMemory memory_;
     ScriptedManager manager_{
         {.maximumOpenEnumerations = 2, .maximumHeldObjects = 12, .maximumObjectCount = 3}};
 };
@@ -105,6 +136,19 @@ TEST_F(PullTest, withoutATimeItIsTheDefault)
     EXPECT_EQ(errorIn(pull(context, 0)), "");
     manager_.wait(60s);
     EXPECT_THAT(errorIn(pull(context, 0)), StartsWith("21"));
+}
+
+TEST_F(PullTest, anyOperationGivesBackTheMemoryWhenTheTimeIsOver)
+{
+    const std::size_t before = memory_.taken();
+    open(0);
+    EXPECT_GT(memory_.taken(), before);
+    manager_.wait(59s);
+    ask("EnumerateClassNames", "");
+    EXPECT_GT(memory_.taken(), before);
+    manager_.wait(1s);
+    ask("EnumerateClassNames", "");
+    EXPECT_EQ(memory_.taken(), before);
 }
 
 TEST_F(PullTest, badTimesAreRefusedBeforeAnythingIsEnumerated)
