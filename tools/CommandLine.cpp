@@ -46,6 +46,7 @@ Commands addCommands(CLI::App& tool)
     commands.push_back(makeGetCommand(tool));
     commands.push_back(makeWalkCommand(tool));
     commands.push_back(makeRecordCommand(tool));
+    commands.push_back(makeServeCommand(tool));
     return commands;
 }
 

@@ -14,5 +14,6 @@ std::unique_ptr<Command> makeListCommand(CLI::App& tool);
 std::unique_ptr<Command> makeGetCommand(CLI::App& tool);
 std::unique_ptr<Command> makeWalkCommand(CLI::App& tool);
 std::unique_ptr<Command> makeRecordCommand(CLI::App& tool);
+std::unique_ptr<Command> makeServeCommand(CLI::App& tool);
 
 } // namespace Tools

@@ -1,0 +1,156 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "host/http/EventLog.h"
+#include "host/http/Privileges.h"
+#include "host/http/Server.h"
+#include "host/manager/SensorProfile.h"
+#include "host/operations/ObjectManager.h"
+#include "platform/utilities/ProviderUtilities.h"
+#include "tools/SourceOptions.h"
+#include "tools/UsageError.h"
+#include "tools/cim/Classes.h"
+#include "tools/commands/Commands.h"
+#include "tools/output/Output.h"
+#include "tools/serve/Greeting.h"
+#include "tools/serve/Protection.h"
+#include "tools/serve/ServeOptions.h"
+#include "tools/serve/Signals.h"
+
+#include <CLI/CLI.hpp>
+
+#include <unistd.h>
+
+#include <chrono>
+#include <cstdlib>
+#include <stdexcept>
+
+namespace Tools {
+
+namespace {
+
+using Host::Http::report;
+
+constexpr const char* serveFooter =
+    "Loopback addresses are served without TLS, and with it where there is a\n"
+    "certificate. All others need --certificate, --key and --passwords.\n"
+    "\n"
+    "The passwords are `user:hash` lines, with the hashes that mkpasswd makes by\n"
+    "yescrypt, bcrypt or sha512crypt. The configuration file has lines of\n"
+    "`name = value`, with the names of the options without dashes.\n"
+    "\n"
+    "SIGTERM and SIGINT let requests that run come to their end; a second one does\n"
+    "not. SIGHUP reads the certificate, the key and the passwords again, as the user\n"
+    "that the server runs as. The log goes to standard error where RYNLOG_LOG says\n"
+    "nothing else.";
+
+// The libraries of the providers have a log of their own, which follows the environment.
+void logToStandardError()
+{
+    constexpr int doNotReplace = 0;
+    ::setenv("RYNLOG_LOG", "stderr", doNotReplace);
+}
+
+std::vector<Host::Http::Endpoint> endpointsFor(const ServeOptions& options)
+{
+    try {
+        return Host::Http::endpointsFor(options.listen);
+    } catch (const std::invalid_argument& error) {
+        throw UsageError(error.what());
+    }
+}
+
+void renounceRoot(const std::optional<std::string>& wanted)
+{
+    if (!Host::Http::isRoot()) {
+        if (wanted && !Host::Http::isUser(*wanted))
+            throw std::runtime_error("only root can run the server as another user, " + *wanted);
+        return;
+    }
+    const std::string user = wanted ? *wanted : Host::Http::unprivilegedUser();
+    Host::Http::becomeUser(user);
+    report({"renounceRoot", "ServeCommand", __LINE__},
+        Host::Http::isRoot() ? "serving as root, as --user says" : "serving as " + user);
+}
+
+void requireReadable(const std::string& file)
+{
+    if (::access(file.c_str(), R_OK) != 0)
+        throw std::system_error(errno, std::system_category(),
+            file + ", which the server needs as the user it runs as (--user names another)");
+}
+
+// Until a signal says to end. False when requests are still running then.
+bool serve(Host::Http::Server& server, const Protection& protection, const Signals& signals,
+    std::chrono::seconds gracePeriod)
+{
+    while (signals.wait() == SIGHUP)
+        protection.renew(server);
+    report({"serve", "ServeCommand", __LINE__}, "ending");
+    server.stopAccepting();
+    constexpr std::chrono::milliseconds interval{20};
+    const auto end = std::chrono::steady_clock::now() + gracePeriod;
+    while (!server.waitUntilQuiet(interval)) {
+        const auto again = signals.waitFor(std::chrono::milliseconds(0));
+        if (again && *again != SIGHUP)
+            endBySignal(*again);
+        if (std::chrono::steady_clock::now() >= end)
+            return false;
+    }
+    return true;
+}
+
+class ServeCommand : public Command {
+public:
+    explicit ServeCommand(CLI::App& tool)
+        : Command(tool, "serve", "Answer CIM clients over HTTP, as an object manager does")
+    {
+        options_.addTo(parser());
+        source_.addModel(parser());
+        source_.addProvider(parser());
+        parser().footer(serveFooter);
+    }
+
+    ExitCode run(Output& out) override
+    {
+        options_.complete(parser());
+        logToStandardError();
+        source_.selectMachine();
+        const Signals signals; // before there are threads
+        const auto endpoints = endpointsFor(options_);
+        const Protection protection(options_);
+        auto sockets = Host::Http::listenOn(endpoints);
+        const auto classes = compileClasses();
+        const ProviderFiles files = source_.providerFiles();
+        renounceRoot(options_.user);
+        requireReadable(files.sensors);
+        if (source_.model())
+            requireReadable(*source_.model());
+
+        Host::ObjectManager manager(*classes,
+            Host::sensorProfileProviders(files.sensors, files.computerSystem),
+            Vorn::getSystemName(), options_.operations);
+        const std::string text = greeting(sockets, protection.passwords() != nullptr);
+        Host::Http::Server server(manager, std::move(sockets), options_.http,
+            protection.certificate(), protection.passwords());
+        out.write(text);
+        out.flush();
+        if (serve(server, protection, signals, options_.gracePeriod))
+            return ExitCode::success;
+        complain("requests were still running at the end of the grace period");
+        // Waiting for them is what nobody wants.
+        ::_exit(static_cast<int>(ExitCode::failure));
+    }
+
+private:
+    ServeOptions options_;
+    SourceOptions source_;
+};
+
+} // namespace
+
+std::unique_ptr<Command> makeServeCommand(CLI::App& tool)
+{
+    return std::make_unique<ServeCommand>(tool);
+}
+
+} // namespace Tools

@@ -1,0 +1,106 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "tools/serve/ConfigurationFile.h"
+
+#include <CLI/CLI.hpp>
+
+#include <cerrno>
+#include <fstream>
+#include <optional>
+#include <set>
+#include <stdexcept>
+#include <string_view>
+#include <system_error>
+
+namespace Tools {
+
+namespace {
+
+// Of the command line alone.
+constexpr std::string_view nameOfFileOption = "config";
+constexpr std::string_view nameOfHelpOption = "help";
+
+std::string_view trimmed(std::string_view text)
+{
+    constexpr std::string_view blanks = " \t\r";
+    const std::size_t first = text.find_first_not_of(blanks);
+    if (first == std::string_view::npos)
+        return {};
+    return text.substr(first, text.find_last_not_of(blanks) - first + 1);
+}
+
+class Reader {
+public:
+    explicit Reader(CLI::App& parser) : parser_(parser) {}
+
+    // Throws std::runtime_error with the reason alone.
+    void take(std::string_view line)
+    {
+        const std::size_t equals = line.find('=');
+        if (equals == std::string_view::npos)
+            throw std::runtime_error("it is no `name = value`");
+        const std::string name(trimmed(line.substr(0, equals)));
+        const std::string value(trimmed(line.substr(equals + 1)));
+        CLI::Option& option = find(name);
+        if (value.empty())
+            throw std::runtime_error(name + " has no value");
+        const bool isFirst = !seen_.contains(&option);
+        if (isFirst)
+            seen_.emplace(&option, option.count() > 0);
+        else if (option.get_multi_option_policy() != CLI::MultiOptionPolicy::TakeAll)
+            throw std::runtime_error("a second line for " + name);
+        if (!seen_.at(&option))
+            set(option, value, isFirst);
+    }
+
+private:
+    CLI::Option& find(const std::string& name)
+    {
+        CLI::Option* const option = name == nameOfFileOption || name == nameOfHelpOption
+                                        ? nullptr
+                                        : parser_.get_option_no_throw("--" + name);
+        if (option == nullptr)
+            throw std::runtime_error("there is no setting \"" + name + "\"");
+        return *option;
+    }
+
+    static void set(CLI::Option& option, const std::string& value, bool isFirst)
+    {
+        try {
+            if (isFirst)
+                option.clear();
+            option.add_result(value);
+            option.run_callback();
+        } catch (const CLI::ParseError& error) {
+            throw std::runtime_error(error.what());
+        }
+    }
+
+    CLI::App& parser_;
+    std::map<const CLI::Option*, bool> seen_; // whether it was typed
+};
+
+} // namespace
+
+void applyConfigurationFile(CLI::App& parser, const std::string& file)
+{
+    std::ifstream in(file);
+    if (!in)
+        throw std::system_error(errno, std::system_category(), file);
+    Reader reader(parser);
+    std::string line;
+    for (std::size_t number = 1; std::getline(in, line); ++number) {
+        const std::string_view text = trimmed(line);
+        if (text.empty() || text.starts_with('#'))
+            continue;
+        try {
+            reader.take(text);
+        } catch (const std::runtime_error& error) {
+            throw std::runtime_error(file + ":" + std::to_string(number) + ": " + error.what());
+        }
+    }
+    if (in.bad())
+        throw std::runtime_error(file + ": it cannot be read");
+}
+
+} // namespace Tools
