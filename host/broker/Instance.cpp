@@ -89,11 +89,16 @@ ObjectPath& Instance::objectPath() const
                 addKeyIfSet(path, *name->text(), key->value);
         return path;
     }
-    // In the order in which they were set, for providers keep the one of their paths.
-    for (const auto& [name, value] : properties_)
+    // In the order in which they were set, for providers keep the one of their paths. Most set
+    // the keys before all else.
+    std::size_t missing = known->size();
+    for (auto property = properties_.begin(); missing != 0 && property != properties_.end();
+         ++property)
         for (const std::string& key : *known)
-            if (equalNames(key, *name->text()))
-                addKeyIfSet(path, key, value);
+            if (equalNames(key, *property->name->text())) {
+                addKeyIfSet(path, key, property->value);
+                --missing;
+            }
     return path;
 }
 

@@ -33,6 +33,20 @@ std::string_view entityFor(char c)
     }
 }
 
+// Printable ASCII without an entity: what nearly all texts consist of.
+constexpr bool isPlain(char c)
+{
+    return c >= ' ' && c <= '~' && c != '&' && c != '<' && c != '>' && c != '"' && c != '\'';
+}
+
+std::size_t countPlain(std::string_view text)
+{
+    std::size_t count = 0;
+    while (count < text.size() && isPlain(text[count]))
+        ++count;
+    return count;
+}
+
 } // namespace
 
 Character firstCharacter(std::string_view text)
@@ -89,7 +103,12 @@ void appendUtf8(std::string& out, char32_t code)
 
 void appendEscaped(std::string& out, std::string_view text)
 {
-    while (!text.empty()) {
+    for (;;) {
+        const std::size_t plain = countPlain(text);
+        out += text.substr(0, plain);
+        text.remove_prefix(plain);
+        if (text.empty())
+            return;
         const Character character = firstCharacter(text);
         const std::string_view entity = entityFor(text.front());
         if (!entity.empty())
