@@ -191,17 +191,24 @@ protected:
         return names;
     }
 
-    // The associations delivered, as pairs of the names of what two references refer to.
-    std::vector<std::string> pairs(const char* one, const char* other) const
+    // The associations of an answer, as pairs of the names of what two references refer to.
+    static std::vector<std::string> pairs(
+        const Host::CollectedResult& answer, const char* one, const char* other)
     {
         std::vector<std::string> found;
-        for (const Host::ObjectPath* const each : answer_.paths())
+        for (const Host::ObjectPath* const each : answer.paths())
             found.push_back(
                 nameOf(*each->key(one)->path()) + " " + nameOf(*each->key(other)->path()));
-        for (const Host::Instance* const each : answer_.instances())
+        for (const Host::Instance* const each : answer.instances())
             found.push_back(nameOf(*each->property(one)->path()) + " " +
                             nameOf(*each->property(other)->path()));
         return found;
+    }
+
+    // The same of what was delivered.
+    std::vector<std::string> pairs(const char* one, const char* other) const
+    {
+        return pairs(answer_, one, other);
     }
 
     ScriptedMachine machine_;

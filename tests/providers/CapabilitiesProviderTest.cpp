@@ -2,9 +2,8 @@
 
 // The requests of ZUMLO_SensorEnabledLogicalElementCapabilities, from the object manager's side.
 
-#include "tests/providers/Factories.h"
+#include "tests/providers/InstanceRequestsTest.h"
 #include "tests/providers/ProfileClasses.h"
-#include "tests/support/ProviderTest.h"
 
 #include <gmock/gmock.h>
 
@@ -13,8 +12,8 @@ namespace {
 using Testing::BrokerMessage;
 using Testing::describe;
 using ::testing::ElementsAre;
+using Testing::InstanceRequestsTest;
 using Testing::namesOf;
-using Testing::ProviderTest;
 using Testing::ScriptedMachine;
 using Vorn::NodeReading;
 using Vorn::NodeLexicon::NodeType;
@@ -24,41 +23,13 @@ constexpr const char* Provider = "SensorEnabledLogicalElementCapabilitiesProvide
 constexpr const char* Identifier = "ZUMLO:SensorEnabledLogicalElementCap1";
 constexpr const char* NoKeyText = "At least one key should be passed";
 
-class CapabilitiesProviderTest : public ProviderTest {
+class CapabilitiesProviderTest : public InstanceRequestsTest {
 protected:
     CapabilitiesProviderTest()
-        : machine_({{NodeType::Tachometer, "/f", "Fan", NodeReading{}}}),
-          mi_(SensorEnabledLogicalElementCapabilitiesProvider_Create_InstanceMI(
-              broker(), nullptr, nullptr))
+        : InstanceRequestsTest(Class,
+              SensorEnabledLogicalElementCapabilitiesProvider_Create_InstanceMI,
+              {{NodeType::Tachometer, "/f", "Fan", NodeReading{}}})
     {
-    }
-
-    CMPIStatus enumerateNames(const char* nameSpace = NameSpace)
-    {
-        return mi_->ft->enumerateInstanceNames(
-            mi_, context(), result(), path(Class, {}, nameSpace).handle());
-    }
-
-    CMPIStatus enumerate(const char** properties = nullptr)
-    {
-        return mi_->ft->enumerateInstances(
-            mi_, context(), result(), path(Class).handle(), properties);
-    }
-
-    CMPIStatus get(const Host::ObjectPath& ref, const char** properties = nullptr)
-    {
-        return mi_->ft->getInstance(mi_, context(), result(), ref.handle(), properties);
-    }
-
-    CMPIStatus get(const std::vector<std::pair<std::string, std::string>>& keys)
-    {
-        return get(path(Class, keys));
-    }
-
-    static void expectOk(const CMPIStatus& status)
-    {
-        EXPECT_EQ(status.rc, CMPI_RC_OK);
-        EXPECT_EQ(status.msg, nullptr);
     }
 
     void expectNothing(bool isDone)
@@ -68,9 +39,6 @@ protected:
         EXPECT_EQ(answer_.isDone(), isDone);
         EXPECT_TRUE(messages_.empty());
     }
-
-    ScriptedMachine machine_;
-    CMPIInstanceMI* mi_;
 };
 
 // ---- EnumInstanceNames ----

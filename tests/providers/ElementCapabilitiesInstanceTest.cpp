@@ -3,7 +3,7 @@
 // The instances of ZUMLO_SensorElementCapabilities: each sensor with each capabilities instance.
 
 #include "providers/SensorElementCapabilities.h"
-#include "tests/providers/AssociationTest.h"
+#include "tests/providers/AssociationInstanceTest.h"
 
 #include <gmock/gmock.h>
 
@@ -18,45 +18,15 @@ constexpr const char* Provider = "SensorElementCapabilitiesProvider";
 constexpr const char* NoKeyText = "At least one key should be passed";
 const std::string Cap = CapabilitiesID;
 
-class ElementCapabilitiesInstanceTest : public AssociationTest {
+const AssociationClass Association = {Class, "ManagedElement", "Capabilities",
+    SensorElementCapabilitiesProvider_Create_InstanceMI,
+    SensorElementCapabilitiesProvider_Create_AssociationMI};
+
+class ElementCapabilitiesInstanceTest : public AssociationInstanceTest {
 protected:
     explicit ElementCapabilitiesInstanceTest(const std::vector<ScriptedNode>& nodes = ThreeSensors)
-        : AssociationTest(SensorElementCapabilitiesProvider_Create_InstanceMI,
-              SensorElementCapabilitiesProvider_Create_AssociationMI, nodes, {})
+        : AssociationInstanceTest(Association, nodes, {})
     {
-    }
-
-    // A path of the association with any values for its keys.
-    Host::ObjectPath& pairPath(const Host::Value& element, const Host::Value& capabilities)
-    {
-        Host::ObjectPath& made = path(Class);
-        made.addKey("ManagedElement", element);
-        made.addKey("Capabilities", capabilities);
-        return made;
-    }
-
-    Host::ObjectPath& pairPath(const Host::ObjectPath& element, const Host::ObjectPath& capability)
-    {
-        return pairPath(Host::Value::of(element), Host::Value::of(capability));
-    }
-
-    std::vector<std::string> pairs() const
-    {
-        return AssociationTest::pairs("ManagedElement", "Capabilities");
-    }
-
-    // GetInstance with a result of its own.
-    std::vector<std::string> got(const Host::ObjectPath& ref)
-    {
-        Host::CollectedResult found;
-        Host::Result into(found);
-        expectOk(instanceMI_->ft->getInstance(
-            instanceMI_, context(), into.handle(), ref.handle(), nullptr));
-        EXPECT_TRUE(found.isDone());
-        std::vector<std::string> elements;
-        for (const Host::Instance* const instance : found.instances())
-            elements.push_back(nameOf(*instance->property("ManagedElement")->path()));
-        return elements;
     }
 };
 
@@ -219,7 +189,7 @@ TEST_F(ElementCapabilitiesInstanceTest, theOrderOfTheKeysDoesNotMatter)
         Host::Value::of(path(SensorClass,
             {{"SystemName", systemName_}, {"DeviceID", "C:/3"},
                 {"SystemCreationClassName", SystemClass}, {"CreationClassName", SensorClass}})));
-    EXPECT_THAT(got(ref), ElementsAre("C:/3"));
+    EXPECT_THAT(got(ref), ElementsAre("C:/3 " + Cap));
 }
 
 TEST_F(ElementCapabilitiesInstanceTest, theLetterCaseOfNamesDoesNotMatter)
@@ -231,7 +201,7 @@ TEST_F(ElementCapabilitiesInstanceTest, theLetterCaseOfNamesDoesNotMatter)
                 {"systemcreationclassname", SystemClass}, {"systemname", systemName_}})));
     ref.addKey("capabilities", Host::Value::of(path("ZUMLO_SENSORENABLEDLOGICALELEMENTCAPABILITIES",
                                    {{"INSTANCEID", CapabilitiesID}}, "ROOT/CIMV2")));
-    EXPECT_THAT(got(ref), ElementsAre("A:/1"));
+    EXPECT_THAT(got(ref), ElementsAre("A:/1 " + Cap));
 }
 
 TEST_F(ElementCapabilitiesInstanceTest, hostsAndAbsentNamespacesDoNotMatter)
@@ -246,7 +216,7 @@ TEST_F(ElementCapabilitiesInstanceTest, hostsAndAbsentNamespacesDoNotMatter)
             }
             Host::ObjectPath& ref = pairPath(element, capability);
             ref.setHost(host);
-            EXPECT_THAT(got(ref), ElementsAre("A:/1"));
+            EXPECT_THAT(got(ref), ElementsAre("A:/1 " + Cap));
         }
 }
 
@@ -314,7 +284,8 @@ TEST_F(ElementCapabilitiesInstanceTest, everyNameThatIsEnumeratedCanBeFetched)
     expectOk(enumerateNames(path(Class)));
     ASSERT_EQ(answer_.paths().size(), 3U);
     for (const Host::ObjectPath* const name : answer_.paths())
-        EXPECT_THAT(got(*name), ElementsAre(nameOf(*name->key("ManagedElement")->path())));
+        EXPECT_THAT(
+            got(*name), ElementsAre(nameOf(*name->key("ManagedElement")->path()) + " " + Cap));
 }
 
 } // namespace

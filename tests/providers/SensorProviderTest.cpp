@@ -2,8 +2,7 @@
 
 // The requests of ZUMLO_NumericSensor, from the object manager's side.
 
-#include "tests/providers/Factories.h"
-#include "tests/support/ProviderTest.h"
+#include "tests/providers/InstanceRequestsTest.h"
 
 #include <gmock/gmock.h>
 
@@ -11,10 +10,10 @@ namespace {
 
 using Testing::BrokerMessage;
 using ::testing::ElementsAre;
+using Testing::InstanceRequestsTest;
 using ::testing::IsEmpty;
 using Testing::LogCapture;
 using Testing::property;
-using Testing::ProviderTest;
 using Testing::ScriptedMachine;
 using Testing::ScriptedNode;
 using Vorn::NodeReading;
@@ -27,39 +26,11 @@ const std::vector<ScriptedNode> Machine = {{NodeType::Temperature, "/p/b", "CPU"
     {NodeType::Temperature, "/p/a", "CPU", NodeReading{}},
     {NodeType::Tachometer, "/p", "Fan", NodeReading{}}};
 
-class SensorProviderTest : public ProviderTest {
+class SensorProviderTest : public InstanceRequestsTest {
 protected:
     explicit SensorProviderTest(const std::vector<ScriptedNode>& nodes = Machine)
-        : machine_(nodes), mi_(SensorProfileProvider_Create_InstanceMI(broker(), nullptr, nullptr))
+        : InstanceRequestsTest(Class, SensorProfileProvider_Create_InstanceMI, nodes)
     {
-    }
-
-    CMPIStatus enumerateNames(const char* nameSpace = NameSpace)
-    {
-        return mi_->ft->enumerateInstanceNames(
-            mi_, context(), result(), path(Class, {}, nameSpace).handle());
-    }
-
-    CMPIStatus enumerate(const char** properties = nullptr)
-    {
-        return mi_->ft->enumerateInstances(
-            mi_, context(), result(), path(Class).handle(), properties);
-    }
-
-    CMPIStatus get(const Host::ObjectPath& ref, const char** properties = nullptr)
-    {
-        return mi_->ft->getInstance(mi_, context(), result(), ref.handle(), properties);
-    }
-
-    CMPIStatus get(const std::vector<std::pair<std::string, std::string>>& keys)
-    {
-        return get(path(Class, keys));
-    }
-
-    static void expectOk(const CMPIStatus& status)
-    {
-        EXPECT_EQ(status.rc, CMPI_RC_OK);
-        EXPECT_EQ(status.msg, nullptr);
     }
 
     std::vector<std::string> deliveredIdentifiers() const
@@ -71,9 +42,6 @@ protected:
             identifiers.emplace_back(*each->property("DeviceID")->text());
         return identifiers;
     }
-
-    ScriptedMachine machine_;
-    CMPIInstanceMI* mi_;
 };
 
 class SensorlessProviderTest : public SensorProviderTest {

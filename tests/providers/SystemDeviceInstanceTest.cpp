@@ -3,7 +3,7 @@
 // The instances of ZUMLO_SensorSystemDevice: each computer system with each sensor.
 
 #include "providers/SensorSystemDevice.h"
-#include "tests/providers/AssociationTest.h"
+#include "tests/providers/AssociationInstanceTest.h"
 
 #include <gmock/gmock.h>
 
@@ -17,46 +17,15 @@ constexpr const char* Class = "ZUMLO_SensorSystemDevice";
 constexpr const char* Provider = "SensorSystemDeviceProvider";
 constexpr const char* NoKeyText = "At least one key should be passed";
 
-class SystemDeviceInstanceTest : public AssociationTest {
+const AssociationClass Association = {Class, "GroupComponent", "PartComponent",
+    SensorSystemDeviceProvider_Create_InstanceMI, SensorSystemDeviceProvider_Create_AssociationMI};
+
+class SystemDeviceInstanceTest : public AssociationInstanceTest {
 protected:
     explicit SystemDeviceInstanceTest(const std::vector<ScriptedNode>& nodes = ThreeSensors,
         const std::vector<std::string>& systems = {"host", "guest"})
-        : AssociationTest(SensorSystemDeviceProvider_Create_InstanceMI,
-              SensorSystemDeviceProvider_Create_AssociationMI, nodes, systems)
+        : AssociationInstanceTest(Association, nodes, systems)
     {
-    }
-
-    Host::ObjectPath& pairPath(const Host::Value& group, const Host::Value& part)
-    {
-        Host::ObjectPath& made = path(Class);
-        made.addKey("GroupComponent", group);
-        made.addKey("PartComponent", part);
-        return made;
-    }
-
-    Host::ObjectPath& pairPath(const Host::ObjectPath& group, const Host::ObjectPath& part)
-    {
-        return pairPath(Host::Value::of(group), Host::Value::of(part));
-    }
-
-    std::vector<std::string> pairs() const
-    {
-        return AssociationTest::pairs("GroupComponent", "PartComponent");
-    }
-
-    // GetInstance with a result of its own.
-    std::vector<std::string> got(const Host::ObjectPath& ref)
-    {
-        Host::CollectedResult found;
-        Host::Result into(found);
-        expectOk(instanceMI_->ft->getInstance(
-            instanceMI_, context(), into.handle(), ref.handle(), nullptr));
-        EXPECT_TRUE(found.isDone());
-        std::vector<std::string> names;
-        for (const Host::Instance* const instance : found.instances())
-            names.push_back(nameOf(*instance->property("GroupComponent")->path()) + " " +
-                            nameOf(*instance->property("PartComponent")->path()));
-        return names;
     }
 
     // That the one up-call came with the request's context, for the class of systems.

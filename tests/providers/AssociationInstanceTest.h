@@ -1,0 +1,66 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// Requests of the instances of an association: pairs of what its two references refer to.
+
+#pragma once
+
+#include "tests/providers/AssociationTest.h"
+
+#include <string>
+#include <utility>
+#include <vector>
+
+namespace Testing {
+
+struct AssociationClass {
+    const char* name;
+    const char* one; // the first reference
+    const char* other;
+    CMPIInstanceMI* (*createInstanceMI)(const CMPIBroker*, const CMPIContext*, CMPIStatus*);
+    CMPIAssociationMI* (*createAssociationMI)(const CMPIBroker*, const CMPIContext*, CMPIStatus*);
+};
+
+class AssociationInstanceTest : public AssociationTest {
+protected:
+    AssociationInstanceTest(const AssociationClass& association, std::vector<ScriptedNode> nodes,
+        std::vector<std::string> systems)
+        : AssociationTest(association.createInstanceMI, association.createAssociationMI,
+              std::move(nodes), std::move(systems)),
+          association_(association)
+    {
+    }
+
+    // A path of the association with any values for its keys.
+    Host::ObjectPath& pairPath(const Host::Value& one, const Host::Value& other)
+    {
+        Host::ObjectPath& made = path(association_.name);
+        made.addKey(association_.one, one);
+        made.addKey(association_.other, other);
+        return made;
+    }
+
+    Host::ObjectPath& pairPath(const Host::ObjectPath& one, const Host::ObjectPath& other)
+    {
+        return pairPath(Host::Value::of(one), Host::Value::of(other));
+    }
+
+    std::vector<std::string> pairs() const
+    {
+        return AssociationTest::pairs(association_.one, association_.other);
+    }
+
+    // GetInstance with a result of its own.
+    std::vector<std::string> got(const Host::ObjectPath& ref)
+    {
+        Host::CollectedResult found;
+        Host::Result into(found);
+        expectOk(instanceMI_->ft->getInstance(
+            instanceMI_, context(), into.handle(), ref.handle(), nullptr));
+        EXPECT_TRUE(found.isDone());
+        return AssociationTest::pairs(found, association_.one, association_.other);
+    }
+
+    AssociationClass association_;
+};
+
+} // namespace Testing
