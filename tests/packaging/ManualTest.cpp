@@ -47,29 +47,62 @@ INSTANTIATE_TEST_SUITE_P(ManualPages, ManualPage,
     testing::Values(
         "sensorctl.1", "sensor-profile-model.5", "sensor-profile.7", "sensor-profile-register.8"));
 
-TEST(ManualOfTheTool, namesEveryCommandAndOption)
+// The help of the tool, then that of each of its commands.
+std::map<std::string, std::string> helpByCommand()
 {
-    const std::string page = rendered("sensorctl.1");
-    const std::string help = run({"--help"}).out;
     static const std::regex command("\n  ([a-z]+) +[A-Z]");
-    std::string all = help;
-    int commands = 0;
-    for (std::sregex_iterator each(help.begin(), help.end(), command), end; each != end; ++each) {
-        EXPECT_THAT(page, HasSubstr("sensorctl " + (*each)[1].str()));
-        all += run({(*each)[1], "--help"}).out;
-        ++commands;
-    }
-    EXPECT_GE(commands, 4);
-    for (const std::string& option : longOptions(all))
-        EXPECT_THAT(page, HasSubstr(option));
+    const std::string help = run({"--help"}).out;
+    std::map<std::string, std::string> texts = {{"", help}};
+    for (std::sregex_iterator each(help.begin(), help.end(), command), end; each != end; ++each)
+        texts[(*each)[1]] = run({(*each)[1], "--help"}).out;
+    return texts;
 }
 
-TEST(ManualOfTheTool, namesNoOptionThatIsNot)
+TEST(ManualOfTheTool, hasEveryCommandAndTheOptionsThereAre)
 {
-    std::string all = run({"--help"}).out;
-    for (const char* const command : {"list", "get", "walk", "record"})
-        all += run({command, "--help"}).out;
-    EXPECT_THAT(longOptions(rendered("sensorctl.1")), testing::IsSubsetOf(longOptions(all)));
+    const std::string page = rendered("sensorctl.1");
+    std::set<std::string> options;
+    for (const auto& [command, help] : helpByCommand()) {
+        EXPECT_THAT(page, HasSubstr("\n     sensorctl " + command));
+        options.merge(longOptions(help));
+    }
+    EXPECT_GE(options.size(), 20U);
+    EXPECT_EQ(longOptions(page), options);
+}
+
+TEST(ManualOfTheTool, hasTheDefaultsOfTheServer)
+{
+    static const std::regex withDefault(R"((--[a-z-]+) [A-Z]+=(\d+))");
+    const std::string page = rendered("sensorctl.1");
+    const std::string help = run({"serve", "--help"}).out;
+    for (std::sregex_iterator each(help.begin(), help.end(), withDefault), end; each != end; ++each)
+        EXPECT_TRUE(std::regex_search(page,
+            std::regex((*each)[1].str() + " [^\n]*(\n +)?[^\n]*\\b" + (*each)[2].str() + "\\b")))
+            << each->str();
+}
+
+// What the file shows as settings are options, with the values they have without it.
+TEST(SettingsOfTheService, areOptionsOfTheServer)
+{
+    static const std::regex setting("#([a-z-]+) = (.*)");
+    const std::string help = run({"serve", "--help"}).out;
+    const std::set<std::string> options = longOptions(help);
+    int settings = 0;
+    std::smatch match;
+    for (const std::string& line :
+        linesOf(contentOf(SENSOR_PROFILE_SOURCE_DIR "/packaging/serve.conf"))) {
+        if (!std::regex_match(line, match, setting)) {
+            EXPECT_TRUE(line.empty() || line.starts_with("# ")) << line;
+            continue;
+        }
+        ++settings;
+        EXPECT_TRUE(options.contains("--" + match[1].str())) << line;
+        if (std::regex_search(help, std::regex("--" + match[1].str() + " [A-Z]+="))) {
+            EXPECT_THAT(
+                help, testing::ContainsRegex("--" + match[1].str() + " [A-Z]+=" + match[2].str()));
+        }
+    }
+    EXPECT_GE(settings, 7);
 }
 
 TEST(ManualOfRegistering, hasTheOptionsOfTheCommand)
