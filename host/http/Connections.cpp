@@ -18,6 +18,13 @@ namespace {
 constexpr std::chrono::milliseconds watchInterval{500};
 constexpr std::chrono::seconds complaintInterval{60};
 
+// Whether the client will send no more, and all it sent was read.
+bool hasFallenSilent(int descriptor)
+{
+    char next = 0;
+    return ::recv(descriptor, &next, 1, MSG_PEEK | MSG_DONTWAIT) == 0;
+}
+
 } // namespace
 
 bool Connections::hasRoomFor(const Address& client)
@@ -169,7 +176,12 @@ void Connections::closeOverdue()
     const std::lock_guard lock(mutex_);
     const auto now = Clock::now();
     for (const ClientConnection& connection : all_) {
-        if (connection.phase == Phase::working || now < connection.deadline)
+        if (connection.phase == Phase::working)
+            continue;
+        // The library does not notice an end that comes together with the last bytes.
+        if (connection.phase != Phase::answering && hasFallenSilent(connection.descriptor))
+            ::shutdown(connection.descriptor, SHUT_RD);
+        if (now < connection.deadline)
             continue;
         mention({"closeOverdue", "Connections", __LINE__},
             "a client at " + connection.address + " is too slow");

@@ -67,6 +67,13 @@ HttpClient::HttpClient(HttpClient&& other) noexcept
 {
 }
 
+HttpClient& HttpClient::operator=(HttpClient&& other) noexcept
+{
+    std::swap(descriptor_, other.descriptor_);
+    std::swap(received_, other.received_);
+    return *this;
+}
+
 HttpClient::~HttpClient()
 {
     if (descriptor_ >= 0)
@@ -84,8 +91,7 @@ bool HttpClient::trySend(std::string_view bytes)
     while (!bytes.empty()) {
         if (!waitFor(POLLOUT, patience))
             throw std::runtime_error("the server does not read");
-        const ::ssize_t sent =
-            ::send(descriptor_, bytes.data(), bytes.size(), MSG_NOSIGNAL | MSG_DONTWAIT);
+        const ::ssize_t sent = write(bytes.data(), bytes.size());
         if (sent < 0 && (errno == EAGAIN || errno == EINTR))
             continue;
         if (sent < 0)
@@ -93,6 +99,16 @@ bool HttpClient::trySend(std::string_view bytes)
         bytes.remove_prefix(static_cast<std::size_t>(sent));
     }
     return true;
+}
+
+::ssize_t HttpClient::write(const char* bytes, std::size_t count)
+{
+    return ::send(descriptor_, bytes, count, MSG_NOSIGNAL | MSG_DONTWAIT);
+}
+
+::ssize_t HttpClient::read(char* bytes, std::size_t count)
+{
+    return ::recv(descriptor_, bytes, count, 0);
 }
 
 void HttpClient::endSending()
@@ -190,7 +206,7 @@ bool HttpClient::readMore()
     if (!waitFor(POLLIN, patience))
         throw std::runtime_error("nothing came");
     std::array<char, 65536> piece{};
-    const ::ssize_t got = ::recv(descriptor_, piece.data(), piece.size(), 0);
+    const ::ssize_t got = read(piece.data(), piece.size());
     if (got < 0 && errno != ECONNRESET)
         failByErrno("recv");
     if (got <= 0)

@@ -4,7 +4,10 @@
 
 #pragma once
 
+#include <sys/types.h>
+
 #include <chrono>
+#include <cstddef>
 #include <cstdint>
 #include <map>
 #include <string>
@@ -31,9 +34,9 @@ public:
     static constexpr std::chrono::seconds patience{20};
 
     explicit HttpClient(std::uint16_t port, const std::string& host = "127.0.0.1");
-    ~HttpClient();
+    virtual ~HttpClient();
     HttpClient(HttpClient&& other) noexcept;
-    HttpClient& operator=(HttpClient&&) = delete;
+    HttpClient& operator=(HttpClient&& other) noexcept;
 
     void send(std::string_view bytes);
     // No more will be sent.
@@ -51,6 +54,13 @@ public:
     bool isClosed();
     // Sends a reset when it is closed.
     void closeHard();
+
+protected:
+    // As send and recv on the socket.
+    virtual ::ssize_t write(const char* bytes, std::size_t count);
+    virtual ::ssize_t read(char* bytes, std::size_t count);
+
+    int descriptor() const { return descriptor_; }
 
 private:
     std::string line();

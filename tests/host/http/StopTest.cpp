@@ -1,0 +1,141 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// How the server ends.
+
+#include "host/http/Timer.h"
+#include "host/http/WorkerPool.h"
+#include "tests/host/http/HttpTest.h"
+
+#include <condition_variable>
+
+namespace HttpTests {
+
+namespace {
+
+using namespace std::chrono_literals;
+
+class StopTest : public HttpTest {
+protected:
+    // Waits until an operation runs.
+    void waitForWork()
+    {
+        for (int i = 0; i < 500 && operations.calls == 0; ++i)
+            std::this_thread::sleep_for(10ms);
+    }
+};
+
+TEST_F(StopTest, RequestsThatRunComeToTheirEnd)
+{
+    operations.work = [](const Message&, const Caller&) { std::this_thread::sleep_for(500ms); };
+    start();
+    HttpClient idle = connect();
+    HttpClient running = connect();
+    running.send(post());
+    waitForWork();
+    server->stopAccepting();
+    EXPECT_FALSE(server->waitUntilQuiet(10ms));
+    EXPECT_THROW(connect(), std::system_error);
+    EXPECT_TRUE(idle.isClosed());
+    const HttpReply reply = running.receive();
+    EXPECT_EQ(reply.status, 200);
+    EXPECT_EQ(reply.field("connection"), "close");
+    EXPECT_TRUE(running.isClosed());
+    EXPECT_TRUE(server->waitUntilQuiet(5s));
+}
+
+TEST_F(StopTest, LargeAnswersAreFetchedToTheirEnd)
+{
+    operations.text = std::string(10'000, 'x');
+    operations.repetitions = 2000;
+    start();
+    HttpClient client = connect();
+    client.send(post());
+    ASSERT_TRUE(client.hasReplyWithin(5s));
+    server->stopAccepting();
+    EXPECT_FALSE(server->waitUntilQuiet(100ms));
+    EXPECT_EQ(client.receive().body.size(), 20'000'000U);
+    EXPECT_TRUE(server->waitUntilQuiet(5s));
+}
+
+TEST_F(StopTest, ServerWithoutClientsIsQuietAtOnce)
+{
+    start();
+    EXPECT_TRUE(server->waitUntilQuiet(0ms));
+    server->stopAccepting();
+    server->stopAccepting();
+    EXPECT_TRUE(server->waitUntilQuiet(0ms));
+}
+
+TEST_F(StopTest, EndCutsOffWhoeverIsThere)
+{
+    operations.work = [](const Message&, const Caller&) { std::this_thread::sleep_for(200ms); };
+    limits.workers = 1;
+    start();
+    std::vector<HttpClient> clients;
+    for (int i = 0; i < 6; ++i)
+        clients.push_back(connect());
+    for (std::size_t i = 0; i < 4; ++i)
+        clients[i].send(post());
+    clients[4].send(post().substr(0, 200));
+    waitForWork();
+    server.reset();
+    for (HttpClient& client : clients)
+        while (!client.receiveSome().empty())
+            continue;
+    EXPECT_EQ(operations.answersAlive, 0);
+}
+
+TEST_F(StopTest, PortIsFreeForTheNextServer)
+{
+    for (int i = 0; i < 3; ++i) {
+        start({{{"127.0.0.1", port}}});
+        EXPECT_EQ(ask(post()).status, 200);
+        server.reset();
+    }
+}
+
+TEST(TimerTest, DoesThingsInTheirOrderAndAtTheEndAllThatIsLeft)
+{
+    std::vector<int> done;
+    {
+        Host::Http::Timer timer;
+        const auto now = std::chrono::steady_clock::now();
+        timer.at(now + 3600s, [&] { done.push_back(4); });
+        timer.at(now + 40ms, [&] { done.push_back(2); });
+        timer.at(now + 20ms, [&] { done.push_back(1); });
+        timer.at(now + 60ms, [&] { done.push_back(3); });
+        std::this_thread::sleep_until(now + 200ms);
+        timer.end();
+        timer.at(now + 3600s, [&] { done.push_back(5); });
+    }
+    EXPECT_EQ(done, (std::vector<int>{1, 2, 3, 4, 5}));
+}
+
+TEST(WorkerPoolTest, BoundsThoseWhoWaitAndFinishesThem)
+{
+    std::atomic<int> done{0};
+    std::mutex gate;
+    std::atomic<int> running{0};
+    {
+        Host::Http::WorkerPool pool(2, 3);
+        std::unique_lock closed(gate);
+        const auto job = [&] {
+            ++running;
+            const std::lock_guard open(gate);
+            ++done;
+        };
+        EXPECT_TRUE(pool.take(job));
+        EXPECT_TRUE(pool.take(job));
+        while (running < 2)
+            std::this_thread::yield();
+        for (int i = 0; i < 3; ++i)
+            EXPECT_TRUE(pool.take(job));
+        EXPECT_FALSE(pool.take(job));
+        closed.unlock();
+    }
+    EXPECT_EQ(done, 5);
+}
+
+} // namespace
+
+} // namespace HttpTests
