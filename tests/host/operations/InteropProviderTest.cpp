@@ -1,0 +1,122 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// The provider of root/interop, as the manager and other providers see it.
+
+#include "host/operations/InteropProvider.h"
+
+#include "host/broker/CollectedResult.h"
+#include "host/broker/Instance.h"
+#include "host/broker/ObjectPath.h"
+#include "host/broker/Refusal.h"
+#include "host/broker/Request.h"
+#include "host/broker/String.h"
+#include "host/manager/Manager.h"
+#include "tests/support/ShippedClasses.h"
+
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+namespace {
+
+using testing::ElementsAre;
+using testing::UnorderedElementsAre;
+
+class InteropProviderTest : public testing::Test {
+protected:
+    // The names of the properties of the one profile.
+    std::vector<std::string> profile(const char** properties)
+    {
+        Host::CollectedResult answer;
+        manager_.enumerateInstances(request_.context(),
+            request_.makePath(Host::InteropNameSpace, Host::RegisteredProfileClass), properties,
+            answer);
+        EXPECT_EQ(answer.instances().size(), 1U);
+        std::vector<std::string> names;
+        for (const Host::NamedValue& property : answer.instances().at(0)->properties())
+            names.emplace_back(*property.name->text());
+        return names;
+    }
+
+    bool isFound(const Host::ObjectPath& path)
+    {
+        try {
+            manager_.getInstance(request_.context(), path, nullptr);
+            return true;
+        } catch (const Host::Refusal& refusal) {
+            EXPECT_EQ(refusal.code(), CMPI_RC_ERR_NOT_FOUND) << refusal.what();
+            return false;
+        }
+    }
+
+    Host::ObjectPath& profilePath(const char* key, std::string_view value)
+    {
+        auto& path = request_.makePath(Host::InteropNameSpace, Host::RegisteredProfileClass);
+        path.addKey(key, Host::Value::text(request_.arena(), value));
+        return path;
+    }
+
+    const std::unique_ptr<const Host::Repository> classes_ = Testing::shippedClasses();
+    Host::InteropProvider interop_{*classes_, "host.example"};
+    Host::Manager manager_{
+        *classes_, Host::InteropProvider::registrations(), [this](const Host::Broker& broker) {
+            return std::make_unique<Host::ProvidersWithInterop>(broker, interop_);
+        }};
+    Host::Request request_{manager_.broker()};
+};
+
+TEST_F(InteropProviderTest, aListLeavesOutAllButTheKeysAndWhatItNames)
+{
+    const char* list[] = {"registeredname", "Unheard", nullptr};
+    EXPECT_THAT(profile(list), ElementsAre("InstanceID", "RegisteredName"));
+    const char* nothing[] = {nullptr};
+    EXPECT_THAT(profile(nothing), ElementsAre("InstanceID"));
+}
+
+TEST_F(InteropProviderTest, whatOneAskedForLeavesTheObjectsAsTheyAre)
+{
+    const char* nothing[] = {nullptr};
+    profile(nothing);
+    EXPECT_THAT(profile(nullptr),
+        UnorderedElementsAre("InstanceID", "ElementName", "RegisteredOrganization",
+            "RegisteredName", "RegisteredVersion", "AdvertiseTypes"));
+}
+
+TEST_F(InteropProviderTest, anObjectIsFoundByAllItsKeys)
+{
+    EXPECT_TRUE(isFound(profilePath("INSTANCEID", "ZUMLO:DSP1009")));
+    EXPECT_FALSE(isFound(profilePath("InstanceID", "zumlo:dsp1009")));
+    EXPECT_FALSE(isFound(request_.makePath(Host::InteropNameSpace, Host::RegisteredProfileClass)));
+    EXPECT_FALSE(isFound(request_.makePath(Host::InteropNameSpace, Host::NamespaceClass)));
+}
+
+TEST_F(InteropProviderTest, thereIsOneNamespaceObjectForEachNamespace)
+{
+    Host::CollectedResult answer;
+    manager_.enumerateInstanceNames(request_.context(),
+        request_.makePath(Host::InteropNameSpace, Host::NamespaceClass), answer);
+    std::vector<std::string> names;
+    for (const Host::ObjectPath* const path : answer.paths())
+        names.emplace_back(*path->key("Name")->text());
+    EXPECT_THAT(names, ElementsAre("root/cimv2", "root/interop"));
+}
+
+TEST_F(InteropProviderTest, everyPropertyIsDeclaredWithItsType)
+{
+    Host::CollectedResult answer;
+    manager_.enumerateInstances(request_.context(),
+        request_.makePath(Host::InteropNameSpace, "CIM_ManagedElement"), nullptr, answer);
+    EXPECT_EQ(answer.instances().size(), 4U);
+    for (const Host::Instance* const instance : answer.instances()) {
+        const auto* const declared =
+            classes_->findClass(Host::InteropNameSpace, instance->className());
+        ASSERT_NE(declared, nullptr);
+        for (const Host::NamedValue& each : instance->properties()) {
+            const auto* const property = declared->property(*each.name->text());
+            ASSERT_NE(property, nullptr) << *each.name->text();
+            EXPECT_EQ(property->name, *each.name->text());
+            EXPECT_EQ(property->type, each.value.type()) << property->name;
+        }
+    }
+}
+
+} // namespace
