@@ -67,25 +67,24 @@ TEST_F(HostileRequestTest, TruncatedRequestsEndWithTheirConnection)
 
 TEST_F(HostileRequestTest, ClientMayEndSendingBehindItsRequest)
 {
-    operations.work = [](const Message&, const Caller&) { std::this_thread::sleep_for(1500ms); };
+    operations.doFirst([](const Message&, const Caller&) { std::this_thread::sleep_for(1500ms); });
     HttpClient client = connect();
     client.send(post());
     client.endSending();
     EXPECT_EQ(client.receive().body, "<answer/>");
     EXPECT_TRUE(client.isClosed());
-    operations.work = nullptr;
+    operations.doFirst(nullptr);
 }
 
 TEST_F(HostileRequestTest, ClientsThatVanishLeaveNothingBehind)
 {
-    operations.work = [](const Message&, const Caller&) { std::this_thread::sleep_for(20ms); };
+    operations.doFirst([](const Message&, const Caller&) { std::this_thread::sleep_for(20ms); });
     for (int i = 0; i < 20; ++i) {
         HttpClient client = connect();
         client.send(post());
         client.closeHard();
     }
-    operations.text = std::string(10'000, 'x');
-    operations.repetitions = 1000;
+    operations.answerWith(std::string(10'000, 'x'), 1000);
     for (int i = 0; i < 5; ++i) {
         HttpClient client = connect();
         client.send(post());
@@ -95,7 +94,6 @@ TEST_F(HostileRequestTest, ClientsThatVanishLeaveNothingBehind)
     for (int i = 0; i < 100 && operations.answersAlive != 0; ++i)
         std::this_thread::sleep_for(50ms);
     EXPECT_EQ(operations.answersAlive, 0);
-    operations.repetitions = 1;
 }
 
 TEST_F(HostileRequestTest, BodiesThatAreNoXmlAreRefused)

@@ -54,23 +54,54 @@ private:
     std::atomic<int>& alive_;
 };
 
-// Answers with what `text` is, so many times; whoever wants something else sets `work`.
+// Answers with <answer/> unless told otherwise.
 class StubOperations : public Host::CimXml::OperationHandler {
 public:
+    using Work = std::function<void(const Message&, const Caller&)>;
+
     std::unique_ptr<Host::CimXml::Answer> answer(
         const Message& message, const Caller& caller) override
     {
         ++calls;
+        const auto [work, text, repetitions] = plan();
         if (work)
             work(message, caller);
+        ++finished;
         return std::make_unique<PiecewiseAnswer>(text, repetitions, answersAlive);
     }
 
-    std::function<void(const Message&, const Caller&)> work{};
-    std::string text = "<answer/>";
-    std::size_t repetitions = 1;
+    // What is done before the answer.
+    void doFirst(Work work)
+    {
+        const std::lock_guard lock(mutex_);
+        plan_.work = std::move(work);
+    }
+    void answerWith(std::string text, std::size_t repetitions = 1)
+    {
+        const std::lock_guard lock(mutex_);
+        plan_.text = std::move(text);
+        plan_.repetitions = repetitions;
+    }
+
     std::atomic<int> calls{0};
+    std::atomic<int> finished{0}; // to be read before what was done first
     std::atomic<int> answersAlive{0};
+
+private:
+    struct Plan {
+        Work work{};
+        std::string text = "<answer/>";
+        std::size_t repetitions = 1;
+    };
+
+    Plan plan()
+    {
+        const std::lock_guard lock(mutex_);
+        return plan_;
+    }
+
+    std::mutex mutex_;
+    Plan plan_;
 };
 
 inline std::string bodyFor(const std::string& operation, const std::string& name = "root")

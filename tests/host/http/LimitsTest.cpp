@@ -166,7 +166,7 @@ TEST_F(LimitsTest, RequestsBeyondTheQueueAreToldToComeAgain)
     limits.workers = 1;
     limits.maximumQueue = 1;
     Gate gate;
-    operations.work = [&](const Message&, const Caller&) { gate.pass(); };
+    operations.doFirst([&](const Message&, const Caller&) { gate.pass(); });
     start();
     HttpClient running = connect();
     running.send(post());
@@ -187,6 +187,7 @@ TEST_F(LimitsTest, RequestsBeyondTheQueueAreToldToComeAgain)
     EXPECT_EQ(refused, 2);
     gate.open();
     EXPECT_EQ(running.receive().status, 200);
+    server.reset(); // nobody passes the gate any more
 }
 
 TEST_F(LimitsTest, SilentConnectionsEnd)
@@ -239,7 +240,7 @@ TEST_F(LimitsTest, OperationsMayTakeLongerThanAnyTimeout)
 {
     limits.requestTimeout = 1s;
     limits.idleTimeout = 1s;
-    operations.work = [](const Message&, const Caller&) { std::this_thread::sleep_for(3s); };
+    operations.doFirst([](const Message&, const Caller&) { std::this_thread::sleep_for(3s); });
     start();
     EXPECT_EQ(ask(post()).status, 200);
 }
@@ -247,8 +248,7 @@ TEST_F(LimitsTest, OperationsMayTakeLongerThanAnyTimeout)
 TEST_F(LimitsTest, ReadersThatDoNotReadEndAndLoseTheirAnswer)
 {
     limits.idleTimeout = 1s;
-    operations.text = std::string(10'000, 'x');
-    operations.repetitions = 5000; // more than the sockets take
+    operations.answerWith(std::string(10'000, 'x'), 5000); // more than the sockets take
     start();
     HttpClient client = connect();
     client.send(post());
@@ -262,8 +262,7 @@ TEST_F(LimitsTest, ReadersThatDoNotReadEndAndLoseTheirAnswer)
 TEST_F(LimitsTest, SlowReadersGetTheirAnswerUpToALimit)
 {
     limits.answerTimeout = 2s;
-    operations.text = std::string(10'000, 'x');
-    operations.repetitions = 10'000;
+    operations.answerWith(std::string(10'000, 'x'), 10'000);
     start();
     HttpClient client = connect();
     client.send(post());

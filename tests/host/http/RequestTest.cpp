@@ -32,11 +32,12 @@ TEST_F(RequestTest, TellsTheOperationWhoAsks)
 {
     Caller seen;
     std::string method;
-    operations.work = [&](const Message& message, const Caller& caller) {
+    operations.doFirst([&](const Message& message, const Caller& caller) {
         seen = caller;
         method = message.methodName();
-    };
+    });
     ask(post("Accept-Language: de, en;q=0.5\r\n"));
+    EXPECT_EQ(operations.finished, 1);
     EXPECT_EQ(method, "EnumerateClasses");
     EXPECT_EQ(seen.principal, "");
     EXPECT_EQ(seen.address, "127.0.0.1");
@@ -93,15 +94,19 @@ TEST_F(RequestTest, ErrorsLeaveTheConnectionForFurtherRequests)
 
 TEST_F(RequestTest, PipelinedRequestsAreAnsweredInTheirOrder)
 {
-    operations.work = [&](const Message& message, const Caller&) {
-        operations.text = message.methodName();
-    };
+    std::vector<std::string> names;
+    operations.doFirst([&](const Message& message, const Caller&) {
+        names.push_back(message.methodName());
+        operations.answerWith(message.methodName());
+    });
     HttpClient client = connect();
     client.send(
         post("", bodyFor("First")) + post("", bodyFor("Second")) + post("", bodyFor("Third")));
-    EXPECT_EQ(client.receive().body, "First");
+    EXPECT_EQ(client.receive().body, "<answer/>");
+    EXPECT_EQ(client.receive().body, "First"); // which came before
     EXPECT_EQ(client.receive().body, "Second");
-    EXPECT_EQ(client.receive().body, "Third");
+    EXPECT_EQ(operations.finished, 3);
+    EXPECT_EQ(names, (std::vector<std::string>{"First", "Second", "Third"}));
 }
 
 TEST_F(RequestTest, BodyMayComeInChunks)
@@ -158,8 +163,7 @@ TEST_F(RequestTest, ClientThatAwaitsASignHearsOfAnErrorInstead)
 
 TEST_F(RequestTest, LargeAnswersComeInChunks)
 {
-    operations.text = std::string(1000, 'x');
-    operations.repetitions = 5000;
+    operations.answerWith(std::string(1000, 'x'), 5000);
     HttpClient client = connect();
     for (int i = 0; i < 3; ++i) {
         client.send(post());
@@ -171,8 +175,7 @@ TEST_F(RequestTest, LargeAnswersComeInChunks)
 
 TEST_F(RequestTest, OldClientsGetTheAnswerUntilTheEndOfTheConnection)
 {
-    operations.text = std::string(1000, 'x');
-    operations.repetitions = 500;
+    operations.answerWith(std::string(1000, 'x'), 500);
     const std::string body = bodyFor("EnumerateClasses");
     HttpClient client = connect();
     client.send("POST /cimom HTTP/1.0\r\n" + usualFields + lengthField(body) + "\r\n" + body);
@@ -185,7 +188,7 @@ TEST_F(RequestTest, OldClientsGetTheAnswerUntilTheEndOfTheConnection)
 
 TEST_F(RequestTest, OperationThatThrowsIsAnInternalError)
 {
-    operations.work = [](const Message&, const Caller&) { throw std::runtime_error("oh"); };
+    operations.doFirst([](const Message&, const Caller&) { throw std::runtime_error("oh"); });
     const HttpReply reply = ask(post());
     EXPECT_EQ(reply.status, 500);
     EXPECT_EQ(reply.body, "the request failed; the log tells why\n");
@@ -193,11 +196,11 @@ TEST_F(RequestTest, OperationThatThrowsIsAnInternalError)
 
 TEST_F(RequestTest, OperationWithoutMemoryEndsItsConnectionOnly)
 {
-    operations.work = [](const Message&, const Caller&) { throw std::bad_alloc(); };
+    operations.doFirst([](const Message&, const Caller&) { throw std::bad_alloc(); });
     HttpClient client = connect();
     client.send(post());
     EXPECT_TRUE(client.isClosed());
-    operations.work = nullptr;
+    operations.doFirst(nullptr);
     EXPECT_EQ(ask(post()).status, 200);
 }
 

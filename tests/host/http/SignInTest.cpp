@@ -212,12 +212,13 @@ TEST_F(SignInTest, WhoSignsInGoesOnOnTheSameConnection)
 {
     start();
     std::string principal;
-    operations.work = [&](const Message&, const Caller& caller) { principal = caller.principal; };
+    operations.doFirst([&](const Message&, const Caller& caller) { principal = caller.principal; });
     HttpClient client = connect();
     client.send(post());
     EXPECT_EQ(client.receive().status, 401);
     client.send(post(right));
     EXPECT_EQ(client.receive().status, 200);
+    EXPECT_EQ(operations.finished, 1);
     EXPECT_EQ(principal, "ann");
     client.send(post());
     EXPECT_EQ(client.receive().status, 401);

@@ -26,7 +26,7 @@ protected:
 
 TEST_F(StopTest, RequestsThatRunComeToTheirEnd)
 {
-    operations.work = [](const Message&, const Caller&) { std::this_thread::sleep_for(500ms); };
+    operations.doFirst([](const Message&, const Caller&) { std::this_thread::sleep_for(500ms); });
     start();
     HttpClient idle = connect();
     HttpClient running = connect();
@@ -45,8 +45,7 @@ TEST_F(StopTest, RequestsThatRunComeToTheirEnd)
 
 TEST_F(StopTest, LargeAnswersAreFetchedToTheirEnd)
 {
-    operations.text = std::string(10'000, 'x');
-    operations.repetitions = 2000;
+    operations.answerWith(std::string(10'000, 'x'), 2000);
     start();
     HttpClient client = connect();
     client.send(post());
@@ -68,7 +67,7 @@ TEST_F(StopTest, ServerWithoutClientsIsQuietAtOnce)
 
 TEST_F(StopTest, EndCutsOffWhoeverIsThere)
 {
-    operations.work = [](const Message&, const Caller&) { std::this_thread::sleep_for(200ms); };
+    operations.doFirst([](const Message&, const Caller&) { std::this_thread::sleep_for(200ms); });
     limits.workers = 1;
     start();
     std::vector<HttpClient> clients;

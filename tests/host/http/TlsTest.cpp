@@ -44,8 +44,7 @@ protected:
 
 TEST_F(TlsTest, AnswersAreTheSameAsWithout)
 {
-    operations.text = std::string(1000, 'x');
-    operations.repetitions = 1000;
+    operations.answerWith(std::string(1000, 'x'), 1000);
     TlsClient client(port);
     EXPECT_EQ(client.version(), "TLS1.3");
     EXPECT_EQ(client.subject(), "CN=one");
