@@ -37,7 +37,7 @@ sensorctl shows the fans, voltages and temperatures of a computer as CIM
 clients see them, and serves them to such clients over HTTP where no other
 object manager runs.")
 set(CPACK_DEBIAN_TOOL_PACKAGE_CONTROL_EXTRA
-  debian/postinst debian/prerm debian/postrm)
+  debian/conffiles debian/postinst debian/prerm debian/postrm)
 list(TRANSFORM CPACK_DEBIAN_TOOL_PACKAGE_CONTROL_EXTRA PREPEND "${CMAKE_CURRENT_LIST_DIR}/")
 
 foreach(component IN ITEMS provider tool)

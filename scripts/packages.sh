@@ -19,7 +19,7 @@ check_packages=(
   libgmock-dev libgtest-dev
   binutils lm-sensors locales util-linux
   openssl sblim-wbemcli
-  debootstrap dpkg-dev file iproute2 lintian man-db mandoc shellcheck
+  debootstrap dpkg-dev file iproute2 lintian man-db mandoc shellcheck systemd
 )
 
 bench_packages=(

@@ -3,6 +3,7 @@
 // An installation, moved from where it was put, works from its own place.
 
 #include "tests/packaging/Installation.h"
+#include "tests/support/ExportedNames.h"
 #include "tests/tools/ToolTest.h"
 
 #include <gmock/gmock.h>
@@ -30,6 +31,7 @@ const std::vector<std::string> providerFiles = {"lib/cmpi/libComputerSystemProvi
     "lib/cmpi/libSensorProfileProvider.so", "sbin/sensor-profile-register",
     "share/doc/sensor-profile-provider/changelog.Debian.gz",
     "share/doc/sensor-profile-provider/changelog.gz", "share/doc/sensor-profile-provider/copyright",
+    "share/doc/sensor-profile-provider/operations.md",
     "share/locale/de/LC_MESSAGES/sensor-profile.mo",
     "share/locale/en/LC_MESSAGES/sensor-profile.mo",
     "share/locale/es/LC_MESSAGES/sensor-profile.mo",
@@ -41,12 +43,13 @@ const std::vector<std::string> providerFiles = {"lib/cmpi/libComputerSystemProvi
     "share/sensor-profile/registration/sensor-profile.reg",
     "share/sensor-profile/sensor-profile.mof"};
 
-const std::vector<std::string> toolFiles = {"bin/sensorctl",
-    "share/bash-completion/completions/sensorctl", "share/doc/sensor-profile/changelog.Debian.gz",
-    "share/doc/sensor-profile/changelog.gz", "share/doc/sensor-profile/copyright",
-    "share/man/man1/sensorctl.1.gz", "share/man/man5/sensor-profile-model.5.gz",
-    "share/sensor-profile/demo-model.json", "share/sensor-profile/host.mof",
-    "share/sensor-profile/interop.mof", "share/sensor-profile/sensor-profile-model.schema.json"};
+const std::vector<std::string> toolFiles = {"bin/sensorctl", "etc/sensor-profile/serve.conf",
+    "lib/systemd/system/sensor-profile.service", "share/bash-completion/completions/sensorctl",
+    "share/doc/sensor-profile/changelog.Debian.gz", "share/doc/sensor-profile/changelog.gz",
+    "share/doc/sensor-profile/copyright", "share/man/man1/sensorctl.1.gz",
+    "share/man/man5/sensor-profile-model.5.gz", "share/sensor-profile/demo-model.json",
+    "share/sensor-profile/host.mof", "share/sensor-profile/interop.mof",
+    "share/sensor-profile/sensor-profile-model.schema.json"};
 
 TEST(Installed, areTheProviderAndTheTool)
 {
@@ -125,9 +128,46 @@ TEST(Installed, librariesAreFoundInEveryFolderOfLibraries)
     }
 }
 
+// As packages are made: the service's files lie outside of /usr.
+TEST(Installed, belowUsrTheServiceIsTheSystems)
+{
+    const TemporaryFolder folder;
+    install({"--component", "tool", "--prefix", "/usr"}, {{"DESTDIR", folder.path().string()}});
+    EXPECT_EQ(contentOf(folder.path() / "etc/sensor-profile/serve.conf"),
+        contentOf(SENSOR_PROFILE_SOURCE_DIR "/packaging/serve.conf"));
+    EXPECT_EQ(contentOf(folder.path() / "lib/systemd/system/sensor-profile.service"),
+        contentOf(SENSOR_PROFILE_SOURCE_DIR "/packaging/sensor-profile.service"));
+    EXPECT_FALSE(fs::exists(folder.path() / "usr/etc"));
+}
+
+TEST(Installed, serviceBelowAPrefixUsesThatPrefix)
+{
+    const TemporaryFolder folder;
+    const std::string prefix = folder.path().string();
+    install({"--component", "tool", "--prefix", prefix});
+    const std::string unit = prefix + "/lib/systemd/system/sensor-profile.service";
+    EXPECT_THAT(
+        contentOf(unit), HasSubstr("\nExecStart=" + prefix + "/bin/sensorctl serve --config " +
+                                   prefix + "/etc/sensor-profile/serve.conf\n"));
+    EXPECT_EQ(outputOf("systemd-analyze verify --man=no '" + unit + "' 2>&1"), "");
+}
+
+TEST(Installed, settingsOfTheAdministratorStay)
+{
+    const TemporaryFolder folder;
+    const std::vector<std::string> arguments = {
+        "--component", "tool", "--prefix", folder.path().string()};
+    install(arguments);
+    folder.write("etc/sensor-profile/serve.conf", "port = 7000\n");
+    install(arguments);
+    EXPECT_EQ(contentOf(folder.path() / "etc/sensor-profile/serve.conf"), "port = 7000\n");
+}
+
 TEST(Installed, nothingNamesTheBuildTheSourcesOrTheFirstPrefix)
 {
     for (const std::string& name : filesBelow(movedInstallation())) {
+        if (name.ends_with(".service"))
+            continue; // a unit needs whole paths
         const std::string content = contentOf(movedInstallation() / name);
         EXPECT_THAT(content.find(SENSOR_PROFILE_BINARY_DIR), std::string::npos) << name;
         EXPECT_THAT(content.find(SENSOR_PROFILE_SOURCE_DIR), std::string::npos) << name;

@@ -31,11 +31,12 @@ private:
 
 } // namespace
 
-void install(const std::vector<std::string>& arguments)
+void install(const std::vector<std::string>& arguments,
+    const std::map<std::string, std::string>& environment)
 {
     std::vector<std::string> command = {"--install", SENSOR_PROFILE_BINARY_DIR};
     command.insert(command.end(), arguments.begin(), arguments.end());
-    const Ended ended = run(command, {.program = SENSOR_PROFILE_CMAKE});
+    const Ended ended = run(command, {.program = SENSOR_PROFILE_CMAKE, .environment = environment});
     if (ended.code != 0)
         throw std::runtime_error("cmake --install: " + ended.out + ended.err);
 }

@@ -7,14 +7,16 @@
 #include "tests/support/TemporaryFolder.h"
 
 #include <filesystem>
+#include <map>
 #include <string>
 #include <vector>
 
 namespace Testing {
 
-// Runs `cmake --install` with these further arguments. Throws std::runtime_error with what it
-// said when it fails.
-void install(const std::vector<std::string>& arguments);
+// Runs `cmake --install` with these further arguments and variables. Throws std::runtime_error with
+// what it said when it fails.
+void install(const std::vector<std::string>& arguments,
+    const std::map<std::string, std::string>& environment = {});
 
 // The files below a folder, sorted and relative to it.
 std::vector<std::string> filesBelow(const std::filesystem::path& folder);
