@@ -1,0 +1,161 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "tests/tools/ServerProcess.h"
+
+#include "tests/tools/ToolTest.h"
+
+#include <fcntl.h>
+#include <spawn.h>
+#include <sys/wait.h>
+#include <unistd.h>
+
+#include <algorithm>
+#include <chrono>
+#include <csignal>
+#include <functional>
+#include <stdexcept>
+#include <system_error>
+#include <thread>
+
+namespace Testing {
+
+namespace {
+
+constexpr std::chrono::seconds patience{30};
+
+bool waitUntil(const std::function<bool()>& isSo)
+{
+    const auto end = std::chrono::steady_clock::now() + patience;
+    while (!isSo()) {
+        if (std::chrono::steady_clock::now() > end)
+            return false;
+        std::this_thread::sleep_for(std::chrono::milliseconds(5));
+    }
+    return true;
+}
+
+bool names(const std::vector<std::string>& arguments, const std::string& option)
+{
+    return std::find(arguments.begin(), arguments.end(), option) != arguments.end();
+}
+
+std::vector<std::string> completed(std::vector<std::string> arguments)
+{
+    const bool isConfigured = names(arguments, "--config");
+    if (!isConfigured && !names(arguments, "--port"))
+        arguments.insert(arguments.end(), {"--port", "0"});
+    if (!isConfigured && !names(arguments, "--tls-port"))
+        arguments.insert(arguments.end(), {"--tls-port", "0"});
+    if (::geteuid() == 0 && !isConfigured && !names(arguments, "--user"))
+        arguments.insert(arguments.end(), {"--user", "root"});
+    arguments.insert(arguments.begin(), {sensorctl, "serve"});
+    return arguments;
+}
+
+std::vector<std::string> entriesOf(const std::map<std::string, std::string>& environment)
+{
+    std::vector<std::string> entries;
+    for (const auto& [name, value] : environment)
+        entries.push_back(name + "=" + value);
+    return entries;
+}
+
+std::vector<char*> pointersTo(std::vector<std::string>& texts)
+{
+    std::vector<char*> pointers;
+    for (std::string& text : texts)
+        pointers.push_back(text.data());
+    pointers.push_back(nullptr);
+    return pointers;
+}
+
+} // namespace
+
+ServerProcess::ServerProcess(
+    std::vector<std::string> arguments, const std::map<std::string, std::string>& environment)
+{
+    std::vector<std::string> command = completed(std::move(arguments));
+    std::map<std::string, std::string> variables{{"LC_ALL", "C"}, {"PATH", "/usr/bin:/bin"}};
+    for (const auto& [name, value] : environment)
+        variables[name] = value;
+    std::vector<std::string> entries = entriesOf(variables);
+    posix_spawn_file_actions_t actions{};
+    ::posix_spawn_file_actions_init(&actions);
+    for (const auto& [descriptor, name] : {std::pair(STDOUT_FILENO, "out"), {STDERR_FILENO, "err"}})
+        ::posix_spawn_file_actions_addopen(&actions, descriptor, (folder_.path() / name).c_str(),
+            O_WRONLY | O_CREAT | O_APPEND, 0666);
+    const int error = ::posix_spawn(&process_, sensorctl.c_str(), &actions, nullptr,
+        pointersTo(command).data(), pointersTo(entries).data());
+    ::posix_spawn_file_actions_destroy(&actions);
+    if (error != 0)
+        throw std::system_error(error, std::generic_category());
+    const bool isUp =
+        waitUntil([this] { return output().find("Try: ") != std::string::npos || hasEnded(); });
+    if (!isUp || process_ == -1) {
+        const std::string reason = isUp ? log() : "nothing was printed";
+        if (process_ != -1)
+            end(SIGKILL);
+        throw std::runtime_error(reason);
+    }
+}
+
+ServerProcess::~ServerProcess()
+{
+    if (process_ == -1)
+        return;
+    ::kill(process_, SIGKILL);
+    ::waitpid(process_, nullptr, 0);
+}
+
+std::string ServerProcess::output() const
+{
+    return contentOf(folder_.path() / "out");
+}
+
+std::string ServerProcess::log() const
+{
+    return contentOf(folder_.path() / "err");
+}
+
+std::uint16_t ServerProcess::port(const std::string& scheme) const
+{
+    const std::string text = output();
+    const std::size_t address = text.find(" " + scheme + "://");
+    if (address == std::string::npos)
+        throw std::runtime_error("not told: " + scheme);
+    const std::size_t end = text.find_first_of(" \n", address + 1);
+    const std::size_t colon = text.rfind(':', end);
+    return static_cast<std::uint16_t>(std::stoul(text.substr(colon + 1, end - colon - 1)));
+}
+
+void ServerProcess::signal(int number) const
+{
+    ::kill(process_, number);
+}
+
+bool ServerProcess::waitForLog(const std::string& text) const
+{
+    return waitUntil([&] { return log().find(text) != std::string::npos; });
+}
+
+Ended ServerProcess::wait()
+{
+    if (!waitUntil([this] { return hasEnded(); }))
+        throw std::runtime_error("the server does not end");
+    ended_.out = output();
+    ended_.err = log();
+    return ended_;
+}
+
+bool ServerProcess::hasEnded()
+{
+    int status = 0;
+    if (process_ == -1 || ::waitpid(process_, &status, WNOHANG) != process_)
+        return process_ == -1;
+    process_ = -1;
+    ended_.code = WIFEXITED(status) ? WEXITSTATUS(status) : -1;
+    ended_.signal = WIFSIGNALED(status) ? WTERMSIG(status) : 0;
+    return true;
+}
+
+} // namespace Testing
