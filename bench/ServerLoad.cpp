@@ -1,0 +1,239 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// What `sensorctl serve` costs: clients that ask again and again, each on a connection of its
+// own, and the same request within this process beside it. Prints tables.
+//
+//     bench_server [seconds for each line of the table]
+
+#include "bench/ModelMachine.h"
+#include "bench/ServerProcess.h"
+#include "host/broker/Broker.h"
+#include "host/broker/CollectedResult.h"
+#include "host/broker/ObjectPath.h"
+#include "host/broker/Request.h"
+#include "host/broker/Result.h"
+#include "tests/providers/Factories.h"
+#include "tests/support/HttpClient.h"
+
+#include <algorithm>
+#include <cstdio>
+#include <cstdlib>
+#include <exception>
+#include <functional>
+#include <future>
+#include <stdexcept>
+#include <string>
+#include <vector>
+
+namespace {
+
+using Bench::ModelMachine;
+using Bench::ServerProcess;
+using Testing::HttpClient;
+using Clock = std::chrono::steady_clock;
+using Milliseconds = std::chrono::duration<double, std::milli>;
+using Seconds = std::chrono::duration<double>;
+using Durations = std::vector<double>; // in milliseconds
+
+constexpr const char* Class = "ZUMLO_NumericSensor";
+
+std::string call(const std::string& method, const std::string& parameter)
+{
+    const std::string body =
+        R"(<?xml version="1.0" encoding="utf-8"?><CIM CIMVERSION="2.0" DTDVERSION="2.0">)"
+        R"(<MESSAGE ID="1" PROTOCOLVERSION="1.0"><SIMPLEREQ><IMETHODCALL NAME=")" +
+        method +
+        R"("><LOCALNAMESPACEPATH><NAMESPACE NAME="root"/><NAMESPACE NAME="cimv2"/>)"
+        R"(</LOCALNAMESPACEPATH>)" +
+        parameter + "</IMETHODCALL></SIMPLEREQ></MESSAGE></CIM>";
+    return "POST /cimom HTTP/1.1\r\nHost: localhost\r\nContent-Type: application/xml\r\n"
+           "CIMOperation: MethodCall\r\nCIMMethod: " +
+           method + "\r\nCIMObject: root/cimv2\r\nContent-Length: " + std::to_string(body.size()) +
+           "\r\n\r\n" + body;
+}
+
+std::string enumerateInstances()
+{
+    return call("EnumerateInstances",
+        R"(<IPARAMVALUE NAME="ClassName"><CLASSNAME NAME="ZUMLO_NumericSensor"/></IPARAMVALUE>)");
+}
+
+std::string getInstance(std::int64_t sensors)
+{
+    const auto key = [](const std::string& name, const std::string& value) {
+        return "<KEYBINDING NAME=\"" + name + "\"><KEYVALUE>" + value + "</KEYVALUE></KEYBINDING>";
+    };
+    return call("GetInstance",
+        R"(<IPARAMVALUE NAME="InstanceName"><INSTANCENAME CLASSNAME="ZUMLO_NumericSensor">)" +
+            key("DeviceID", ModelMachine::someDeviceID(sensors)) + "</INSTANCENAME></IPARAMVALUE>");
+}
+
+double median(Durations durations)
+{
+    std::sort(durations.begin(), durations.end());
+    return durations.at(durations.size() / 2);
+}
+
+// Throws unless the answer has so many instances.
+void check(const Testing::HttpReply& reply, std::int64_t instances)
+{
+    std::int64_t found = 0;
+    for (auto at = reply.body.find("<INSTANCE "); at != std::string::npos;
+         at = reply.body.find("<INSTANCE ", at + 1))
+        ++found;
+    if (found != instances)
+        throw std::runtime_error("a request failed: " + reply.body.substr(0, 500));
+}
+
+struct Load {
+    const char* operation;
+    std::int64_t sensors;
+    std::string request;
+    std::int64_t instances; // of the answer
+};
+
+// One connection, one request after another. The first one is not counted, but looked at.
+Durations askUntil(Clock::time_point end, std::uint16_t port, const Load& load)
+{
+    HttpClient client(port);
+    client.send(load.request);
+    check(client.receive(), load.instances);
+    Durations durations;
+    do {
+        const auto begin = Clock::now();
+        client.send(load.request);
+        if (client.receive().status != 200)
+            throw std::runtime_error("a request failed");
+        durations.push_back(Milliseconds(Clock::now() - begin).count());
+    } while (Clock::now() < end);
+    return durations;
+}
+
+void printLoad(const Load& load, unsigned clients, Seconds time, std::uint16_t port)
+{
+    const auto begin = Clock::now();
+    const auto end = begin + std::chrono::duration_cast<Clock::duration>(time);
+    std::vector<std::future<Durations>> asked;
+    for (unsigned i = 0; i < clients; ++i)
+        asked.push_back(std::async(std::launch::async, askUntil, end, port, std::cref(load)));
+    Durations all;
+    for (std::future<Durations>& each : asked) {
+        const Durations own = each.get();
+        all.insert(all.end(), own.begin(), own.end());
+    }
+    const double elapsed = Seconds(Clock::now() - begin).count();
+    std::sort(all.begin(), all.end());
+    std::printf("| %s | %ld | %u | %.0f | %.2f | %.2f |\n", load.operation,
+        static_cast<long>(load.sensors), clients, static_cast<double>(all.size()) / elapsed,
+        all.at(all.size() / 2), all.at(all.size() * 99 / 100));
+}
+
+void printLoads(Seconds time)
+{
+    std::puts("| operation | sensors | clients | requests/s | p50 ms | p99 ms |\n"
+              "|---|---|---|---|---|---|");
+    for (const std::int64_t sensors : {40, 1000, 10000}) {
+        const ModelMachine machine(sensors);
+        const ServerProcess server;
+        for (const Load& load : {Load{"GetInstance", sensors, getInstance(sensors), 1},
+                 Load{"EnumerateInstances", sensors, enumerateInstances(), sensors}})
+            for (const unsigned clients : {1U, 8U})
+                printLoad(load, clients, time, server.port());
+    }
+}
+
+// The same answer from the provider in this process, as objects.
+void enumerateHere(const Host::Broker& broker, CMPIInstanceMI& mi, std::size_t sensors)
+{
+    Host::Request request(broker);
+    Host::CollectedResult answer;
+    Host::Result result(answer);
+    mi.ft->enumerateInstances(&mi, request.context().handle(), result.handle(),
+        request.makePath("root/cimv2", Class).handle(), nullptr);
+    if (answer.instances().size() != sensors)
+        throw std::runtime_error("an answer in this process is not whole");
+}
+
+void printComparison()
+{
+    constexpr std::int64_t sensors = 1000;
+    constexpr int rounds = 200;
+    const ModelMachine machine(sensors);
+    const ServerProcess server;
+    const Host::Broker broker;
+    CMPIInstanceMI& mi =
+        *SensorProfileProvider_Create_InstanceMI(broker.handle(), nullptr, nullptr);
+    HttpClient client(server.port());
+    const std::string request = enumerateInstances();
+    client.send(request);
+    check(client.receive(), sensors);
+    Durations here;
+    Durations there;
+    std::size_t bytes = 0;
+    for (int i = 0; i < rounds; ++i) { // in turn, so that both meet the same machine
+        auto begin = Clock::now();
+        enumerateHere(broker, mi, sensors);
+        here.push_back(Milliseconds(Clock::now() - begin).count());
+        begin = Clock::now();
+        client.send(request);
+        bytes = client.receive().body.size();
+        there.push_back(Milliseconds(Clock::now() - begin).count());
+    }
+    std::printf("EnumerateInstances of %ld sensors: %.2f ms in process, %.2f ms over HTTP "
+                "(%zu bytes), ratio %.2f\n",
+        static_cast<long>(sensors), median(here), median(there), bytes,
+        median(there) / median(here));
+}
+
+void printLargeAnswer()
+{
+    constexpr std::int64_t sensors = 60000;
+    const ModelMachine machine(sensors);
+    const ServerProcess server;
+    HttpClient client(server.port());
+    for (int round = 0; round < 3; ++round) {
+        const auto begin = Clock::now();
+        client.send(enumerateInstances());
+        if (!client.hasReplyWithin(HttpClient::patience))
+            throw std::runtime_error("no answer");
+        const double first = Milliseconds(Clock::now() - begin).count();
+        const std::size_t bytes = client.receive().body.size();
+        std::printf("EnumerateInstances of %ld sensors: first byte after %.0f ms, %zu bytes after "
+                    "%.0f ms, peak memory %zu MiB\n",
+            static_cast<long>(sensors), first, bytes, Milliseconds(Clock::now() - begin).count(),
+            server.peakMemory() / 1024);
+    }
+}
+
+void printRest()
+{
+    const ModelMachine machine(40);
+    Durations startUps;
+    for (int i = 0; i < 20; ++i)
+        startUps.push_back(Milliseconds(ServerProcess().startUp()).count());
+    const ServerProcess server;
+    HttpClient client(server.port());
+    const std::size_t fresh = server.residentMemory();
+    client.send(enumerateInstances());
+    client.receive();
+    std::printf("start-up %.1f ms; at rest %.1f MiB, after a first request %.1f MiB\n",
+        median(startUps), static_cast<double>(fresh) / 1024,
+        static_cast<double>(server.residentMemory()) / 1024);
+}
+
+} // namespace
+
+int main(int argc, char** argv)
+{
+    try {
+        const Seconds time(argc > 1 ? std::atof(argv[1]) : 3.0);
+        printRest();
+        printComparison();
+        printLargeAnswer();
+        printLoads(time);
+        return 0;
+    } catch (const std::exception& error) {
+        std::fprintf(stderr, "bench_server: %s\n", error.what());
+        return 1;
+    }
+}
