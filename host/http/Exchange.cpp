@@ -117,11 +117,10 @@ void Exchange::tryPassword(const Credentials& credentials)
     }
 }
 
+// REQUIRES: none of the body was received.
 bool Exchange::refuse(const HttpError& error)
 {
     error_ = error;
-    body_.clear();
-    body_.shrink_to_fit();
     // A client that still sends would not see an answer before it has finished, or not at all;
     // and the library ends connections that are answered before the request's end.
     const bool isBodyBearable = bodySize_.bytes.value_or(0) <= 2 * service_.limits.maximumBody;
@@ -165,8 +164,11 @@ bool Exchange::receive(std::string_view piece)
         return true;
     }
     discarded_ = body_.size() + piece.size();
-    return refuse(HttpError(Status::contentTooLarge,
-        "a body holds at most " + std::to_string(service_.limits.maximumBody) + " bytes"));
+    error_.emplace(Status::contentTooLarge,
+        "a body holds at most " + std::to_string(service_.limits.maximumBody) + " bytes");
+    body_ = {};
+    state_ = State::discarding;
+    return true;
 }
 
 bool Exchange::startWork()
@@ -193,7 +195,8 @@ void Exchange::work() noexcept
         } catch (const std::bad_alloc&) {
             throw;
         } catch (const std::exception& error) {
-            report({"work", "Exchange", __LINE__}, error.what());
+            report(
+                {"work", "Exchange", __LINE__}, std::string("a request failed: ") + error.what());
             error_ = HttpError(Status::internalError, "the request failed; the log tells why");
         }
         if (error_)
@@ -208,8 +211,7 @@ void Exchange::work() noexcept
 void Exchange::carryOut()
 {
     const CimXml::Message message(body_, service_.limits.maximumDepth);
-    body_.clear();
-    body_.shrink_to_fit();
+    body_ = {};
     requireMatch(head_, message);
     answer_ = service_.operations.answer(message, caller_);
     while (piece_.size() < answerHead) {

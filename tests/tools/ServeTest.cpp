@@ -53,6 +53,16 @@ std::size_t sensorsIn(const std::string& answer)
     return count;
 }
 
+// A client whose request the server has seen the head of.
+HttpClient beginRequest(std::uint16_t port)
+{
+    HttpClient client(port);
+    const std::string whole = request("Expect: 100-continue\r\n");
+    client.send(whole.substr(0, whole.find("\r\n\r\n") + 4));
+    client.receiveSome();
+    return client;
+}
+
 HttpReply ask(HttpClient client, const std::string& text = request())
 {
     client.send(text);
@@ -127,9 +137,7 @@ TEST_F(ServeTest, InterruptEndsItToo)
 TEST_F(ServeTest, SecondSignalEndsItAtOnce)
 {
     ServerProcess server(withModel());
-    HttpClient client(server.port());
-    client.send("POST /cimom HTTP/1.1\r\n");
-    std::this_thread::sleep_for(200ms);
+    const HttpClient client = beginRequest(server.port());
     server.signal(SIGTERM);
     ASSERT_TRUE(server.waitForLog(" ending\n"));
     EXPECT_EQ(server.end(SIGTERM).signal, SIGTERM);
@@ -138,9 +146,7 @@ TEST_F(ServeTest, SecondSignalEndsItAtOnce)
 TEST_F(ServeTest, GracePeriodBoundsTheEnd)
 {
     ServerProcess server(withModel({"--grace-period", "1"}));
-    HttpClient client(server.port());
-    client.send("POST /cimom HTTP/1.1\r\n");
-    std::this_thread::sleep_for(200ms);
+    const HttpClient client = beginRequest(server.port());
     const Ended ended = server.end(SIGTERM);
     EXPECT_EQ(ended.code, 1);
     EXPECT_THAT(ended.err, EndsWith("sensorctl: requests were still running at the end of the "

@@ -46,8 +46,9 @@ constexpr const char* serveFooter =
 // The libraries of the providers have a log of their own, which follows the environment.
 void logToStandardError()
 {
-    constexpr int doNotReplace = 0;
-    ::setenv("RYNLOG_LOG", "stderr", doNotReplace);
+    const char* const wanted = ::getenv("RYNLOG_LOG");
+    if (wanted == nullptr || *wanted == '\0')
+        ::setenv("RYNLOG_LOG", "stderr", 1);
 }
 
 std::vector<Host::Http::Endpoint> endpointsFor(const ServeOptions& options)
@@ -123,6 +124,8 @@ public:
         const ProviderFiles files = source_.providerFiles();
         renounceRoot(options_.user);
         requireReadable(files.sensors);
+        if (files.computerSystem)
+            requireReadable(*files.computerSystem);
         if (source_.model())
             requireReadable(*source_.model());
 

@@ -17,8 +17,8 @@ class HostileRequestTest : public HttpTest {
 protected:
     HostileRequestTest()
     {
-        limits.idleTimeout = 2s;
-        limits.requestTimeout = 3s;
+        limits.idleTimeout = 6s;
+        limits.requestTimeout = 2s;
         limits.maximumConnections = 1000;
         limits.maximumConnectionsPerAddress = 1000;
         start();

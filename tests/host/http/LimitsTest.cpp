@@ -92,6 +92,12 @@ TEST_F(LimitsTest, ChunksBeyondTheLimitAreRefused)
     HttpClient client = connect();
     client.send(head + chunk + chunk + chunk + "0\r\n\r\n");
     EXPECT_EQ(client.receive().status, 413);
+    HttpClient awaiting = connect();
+    awaiting.send("POST /cimom HTTP/1.1\r\n" + usualFields +
+                  "Transfer-Encoding: chunked\r\nExpect: 100-continue\r\n\r\n");
+    EXPECT_THAT(awaiting.receiveSome(), StartsWith("HTTP/1.1 100 "));
+    awaiting.send(chunk + chunk + chunk + "0\r\n\r\n");
+    EXPECT_EQ(awaiting.receive().status, 413);
     HttpClient endless = connect();
     std::string chunks;
     for (int i = 0; i < 1000; ++i)
@@ -172,21 +178,27 @@ TEST_F(LimitsTest, RequestsBeyondTheQueueAreToldToComeAgain)
     running.send(post());
     gate.waitFor(1);
     std::vector<HttpClient> others;
-    int refused = 0;
     for (int i = 0; i < 3; ++i) {
         others.push_back(connect());
         others.back().send(post());
     }
-    for (HttpClient& other : others)
-        if (other.hasReplyWithin(1s)) {
-            const HttpReply reply = other.receive();
+    const auto end = std::chrono::steady_clock::now() + HttpClient::patience;
+    while (others.size() > 1 && std::chrono::steady_clock::now() < end)
+        for (auto other = others.begin(); other != others.end();) {
+            if (!other->hasReplyWithin(10ms)) {
+                ++other;
+                continue;
+            }
+            const HttpReply reply = other->receive();
             EXPECT_EQ(reply.status, 503);
             EXPECT_EQ(reply.field("retry-after"), "1");
-            ++refused;
+            other = others.erase(other);
         }
-    EXPECT_EQ(refused, 2);
+    ASSERT_EQ(others.size(), 1U);
+    EXPECT_FALSE(others.front().hasReplyWithin(100ms)); // it waits
     gate.open();
     EXPECT_EQ(running.receive().status, 200);
+    EXPECT_EQ(others.front().receive().status, 200);
     server.reset(); // nobody passes the gate any more
 }
 
@@ -271,7 +283,7 @@ TEST_F(LimitsTest, SlowReadersGetTheirAnswerUpToALimit)
         total += some.size();
         std::this_thread::sleep_for(10ms);
     }
-    EXPECT_GT(total, 1'000'000U);
+    EXPECT_GT(total, 100'000U);
     EXPECT_LT(total, 100'000'000U);
 }
 

@@ -294,7 +294,7 @@ TEST_F(SignInTest, SeveralConnectionsGuessNoFaster)
 
 TEST_F(SignInTest, WhoIsSignedInNeedNotWaitForThoseWhoGuess)
 {
-    limits.signInDelay = 2s;
+    limits.signInDelay = 60s;
     start();
     HttpClient client = connect();
     client.send(post(right));
@@ -305,7 +305,7 @@ TEST_F(SignInTest, WhoIsSignedInNeedNotWaitForThoseWhoGuess)
     const auto begin = std::chrono::steady_clock::now();
     client.send(post(right));
     EXPECT_EQ(client.receive().status, 200);
-    EXPECT_LT(std::chrono::steady_clock::now() - begin, 1s);
+    EXPECT_LT(std::chrono::steady_clock::now() - begin, 10s);
 }
 
 TEST_F(SignInTest, NewPasswordsCountAtOnce)

@@ -26,7 +26,7 @@ protected:
 
 TEST_F(StopTest, RequestsThatRunComeToTheirEnd)
 {
-    operations.doFirst([](const Message&, const Caller&) { std::this_thread::sleep_for(500ms); });
+    operations.doFirst([](const Message&, const Caller&) { std::this_thread::sleep_for(1s); });
     start();
     HttpClient idle = connect();
     HttpClient running = connect();
