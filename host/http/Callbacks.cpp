@@ -11,6 +11,9 @@
 
 #include <array>
 #include <cstdio>
+#include <memory>
+#include <new>
+#include <string>
 #include <string_view>
 
 namespace Host::Http::Callbacks {

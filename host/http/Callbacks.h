@@ -7,6 +7,7 @@
 #include <microhttpd.h>
 
 #include <cstdarg>
+#include <cstddef>
 
 namespace Host::Http::Callbacks {
 

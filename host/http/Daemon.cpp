@@ -8,7 +8,10 @@
 
 #include <microhttpd.h>
 
+#include <cstddef>
+#include <cstdint>
 #include <stdexcept>
+#include <string>
 #include <utility>
 #include <vector>
 

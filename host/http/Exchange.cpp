@@ -17,7 +17,9 @@
 #include <algorithm>
 #include <chrono>
 #include <cstring>
+#include <exception>
 #include <new>
+#include <string>
 #include <utility>
 
 namespace Host::Http {

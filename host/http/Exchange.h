@@ -56,9 +56,6 @@ public:
     bool begin(const RequestHead& head, std::size_t headSize);
     bool proceed(std::string_view piece);
 
-    // Whether begin() was called.
-    bool hasBegun() const { return state_ != State::fresh; }
-
     // The next part of an answer that was not whole when it began; what the library expects of
     // a content reader.
     ::ssize_t read(char* to, std::size_t room) noexcept;

@@ -6,8 +6,9 @@
 #include "host/http/MandatoryExtension.h"
 #include "host/http/MediaType.h"
 
-#include <algorithm>
 #include <charconv>
+#include <string_view>
+#include <system_error>
 
 namespace Host::Http {
 

@@ -12,6 +12,7 @@
 
 #include <list>
 #include <mutex>
+#include <optional>
 #include <utility>
 
 namespace Host::Http {
