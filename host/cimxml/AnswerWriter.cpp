@@ -4,7 +4,6 @@
 
 #include "host/broker/Arena.h"
 #include "host/cimxml/ClassWriter.h"
-#include "host/cimxml/InstanceWriter.h"
 #include "host/cimxml/Markup.h"
 #include "host/cimxml/Message.h"
 #include "host/cimxml/QualifierWriter.h"
@@ -99,7 +98,8 @@ AnswerWriter::AnswerWriter(const Message& message, OperationKind kind, const Rep
     Location location, PropertySelection selection, Sink sink)
     : id_(message.id()), protocolVersion_(message.protocolVersion()),
       methodName_(message.methodName()), kind_(kind), classes_(classes),
-      location_(std::move(location)), selection_(std::move(selection)), sink_(std::move(sink))
+      location_(std::move(location)), selection_(std::move(selection)), instances_(selection_),
+      sink_(std::move(sink))
 {
 }
 
@@ -113,14 +113,14 @@ void AnswerWriter::instance(const Instance& instance)
     const ClassDeclaration* const declared = classes_.findClass(nameSpace, instance.className());
     const std::string_view wrapper = wrapperOf(kind_);
     if (wrapper.empty()) {
-        writeInstance(piece_, instance, declared, selection_);
+        instances_.write(piece_, instance, declared);
     } else {
         const Markup element(piece_, wrapper);
         if (kind_ == OperationKind::enumerateInstances)
             writeInstanceName(piece_, path);
         else
             writeInstancePath(piece_, path, location_);
-        writeInstance(piece_, instance, declared, selection_);
+        instances_.write(piece_, instance, declared);
     }
     send();
 }

@@ -5,6 +5,7 @@
 #pragma once
 
 #include "host/broker/Value.h"
+#include "host/cimxml/InstanceWriter.h"
 #include "host/cimxml/Operation.h"
 #include "host/cimxml/PathWriter.h"
 #include "host/repository/Repository.h"
@@ -64,6 +65,7 @@ private:
     const Repository& classes_;
     Location location_;
     PropertySelection selection_;
+    InstanceWriter instances_;
     Sink sink_;
     std::string piece_; // what goes out next
     bool hasBegun_ = false;

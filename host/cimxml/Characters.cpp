@@ -2,6 +2,8 @@
 
 #include "host/cimxml/Characters.h"
 
+#include <array>
+
 namespace Host::CimXml {
 
 namespace {
@@ -15,7 +17,7 @@ constexpr unsigned byteAt(std::string_view text, std::size_t at)
     return static_cast<unsigned char>(text[at]);
 }
 
-std::string_view entityFor(char c)
+constexpr std::string_view entityFor(char c)
 {
     switch (c) {
     case '&':
@@ -33,16 +35,18 @@ std::string_view entityFor(char c)
     }
 }
 
-// Printable ASCII without an entity: what nearly all texts consist of.
-constexpr bool isPlain(char c)
-{
-    return c >= ' ' && c <= '~' && c != '&' && c != '<' && c != '>' && c != '"' && c != '\'';
-}
+// For each byte whether it is printable ASCII without an entity: what nearly all texts consist of.
+constexpr std::array<bool, 256> Plain = [] {
+    std::array<bool, 256> plain{};
+    for (unsigned byte = ' '; byte <= '~'; ++byte)
+        plain[byte] = entityFor(static_cast<char>(byte)).empty();
+    return plain;
+}();
 
 std::size_t countPlain(std::string_view text)
 {
     std::size_t count = 0;
-    while (count < text.size() && isPlain(text[count]))
+    while (count < text.size() && Plain[byteAt(text, count)])
         ++count;
     return count;
 }

@@ -16,23 +16,25 @@ namespace {
 
 void writeOne(std::string& out, const Value& value)
 {
-    Markup element(out, "VALUE");
-    const Instance* const embedded = value.instance();
-    if (embedded == nullptr) {
-        element.content(writeLiteral(value));
-        return;
+    out += "<VALUE>";
+    if (const Instance* const embedded = value.instance()) {
+        std::string text;
+        InstanceWriter().write(text, *embedded, nullptr);
+        appendEscaped(out, text);
+    } else {
+        appendLiteral(out, value);
     }
-    std::string text;
-    writeInstance(text, *embedded, nullptr, {});
-    element.content(text);
+    out += "</VALUE>";
 }
 
-void writeProperty(std::string& out, std::string_view name, const Value& value,
-    const PropertyDeclaration* property, const ClassDeclaration* declared,
-    const PropertySelection& selection)
+// The element without its value. Returns where that belongs.
+std::size_t writeFrame(std::string& out, std::string_view name, CMPIType valueType,
+    const ClassDeclaration* declared, const PropertySelection& selection)
 {
-    const bool isTypeless = value.type() == CMPI_null && property != nullptr;
-    const CMPIType type = isTypeless ? property->type : value.type();
+    const PropertyDeclaration* const property =
+        declared == nullptr ? nullptr : declared->property(name);
+    const bool isTypeless = valueType == CMPI_null && property != nullptr;
+    const CMPIType type = isTypeless ? property->type : valueType;
     Markup element(out, elementNameFor(type));
     element.attribute("NAME", name);
     if (type != CMPI_ref)
@@ -52,7 +54,7 @@ void writeProperty(std::string& out, std::string_view name, const Value& value,
         writeEmbeddedObject(element, property->qualifiers);
     if (property != nullptr)
         writeQualifiers(out, property->qualifiers, selection);
-    writeValue(out, value);
+    return out.size();
 }
 
 } // namespace
@@ -75,19 +77,45 @@ void writeValue(std::string& out, const Value& value)
         writeValue(out, each);
 }
 
-void writeInstance(std::string& out, const Instance& instance, const ClassDeclaration* declared,
-    const PropertySelection& selection)
+void InstanceWriter::write(
+    std::string& out, const Instance& instance, const ClassDeclaration* declared)
 {
+    if (declared != declared_)
+        frames_.clear();
+    declared_ = declared;
+    next_ = 0;
     Markup element(out, "INSTANCE");
     element.attribute("CLASSNAME", instance.className());
     if (declared != nullptr)
-        writeQualifiers(out, declared->qualifiers, selection);
+        writeQualifiers(out, declared->qualifiers, selection_);
     for (const auto& [name, value] : instance.properties()) {
-        const std::string_view spelling = *name->text();
-        if (isSelected(selection, declared, spelling))
-            writeProperty(out, spelling, value,
-                declared == nullptr ? nullptr : declared->property(spelling), declared, selection);
+        const Frame& frame = frameFor(*name->text(), value.type());
+        if (frame.text.empty())
+            continue;
+        out.append(frame.text, 0, frame.valueAt);
+        writeValue(out, value);
+        out.append(frame.text, frame.valueAt);
     }
+}
+
+// Instances of a class mostly have the same properties in the same order.
+const InstanceWriter::Frame& InstanceWriter::frameFor(std::string_view property, CMPIType valueType)
+{
+    for (std::size_t tried = 0; tried < frames_.size(); ++tried) {
+        const Frame& next = frames_[next_];
+        next_ = next_ + 1 == frames_.size() ? 0 : next_ + 1;
+        if (next.valueType == valueType && next.property == property)
+            return next;
+    }
+    return frames_.emplace_back(makeFrame(property, valueType));
+}
+
+InstanceWriter::Frame InstanceWriter::makeFrame(std::string_view name, CMPIType valueType) const
+{
+    Frame frame{std::string(name), valueType, {}, 0};
+    if (isSelected(selection_, declared_, name))
+        frame.valueAt = writeFrame(frame.text, name, valueType, declared_, selection_);
+    return frame;
 }
 
 } // namespace Host::CimXml

@@ -99,21 +99,34 @@ std::optional<Value> readDateTime(Arena& arena, std::string_view text)
     }
 }
 
-// The shortest text that reads back as the same number, with the point the protocol wants.
-std::string writeReal(CMPIType type, double number)
+void appendCharacter(std::string& out, char32_t code)
 {
-    if (std::isnan(number))
-        return "NaN";
-    if (std::isinf(number))
-        return number < 0 ? "-INF" : "INF";
+    std::string character;
+    appendUtf8(character, isXmlCharacter(code) ? code : U'\xFFFD');
+    appendEscaped(out, character);
+}
+
+template <typename Number>
+void appendNumber(std::string& out, Number number)
+{
     std::array<char, 32> buffer{};
-    const auto end = type == CMPI_real32
-                         ? std::to_chars(buffer.begin(), buffer.end(), static_cast<float>(number))
-                         : std::to_chars(buffer.begin(), buffer.end(), number);
-    std::string text(buffer.begin(), end.ptr);
-    if (text.find('.') == std::string::npos)
-        text.insert(std::min(text.find('e'), text.size()), ".0");
-    return text;
+    out.append(buffer.data(), std::to_chars(buffer.begin(), buffer.end(), number).ptr);
+}
+
+// The shortest text that reads back as the same number, with the point the protocol wants.
+template <typename Number>
+void appendReal(std::string& out, Number number)
+{
+    if (std::isnan(number)) {
+        out += "NaN";
+    } else if (std::isinf(number)) {
+        out += number < 0 ? "-INF" : "INF";
+    } else {
+        const std::size_t begin = out.size();
+        appendNumber(out, number);
+        if (out.find('.', begin) == std::string::npos)
+            out.insert(std::min(out.find('e', begin), out.size()), ".0");
+    }
 }
 
 } // namespace
@@ -164,27 +177,27 @@ std::optional<Value> readNumber(Arena& arena, std::string_view text)
     return std::nullopt;
 }
 
-std::string writeLiteral(const Value& value)
+void appendLiteral(std::string& out, const Value& value)
 {
-    if (const auto text = value.text())
-        return std::string(*text);
-    if (const auto truth = value.boolean())
-        return *truth ? "TRUE" : "FALSE";
-    if (const auto number = value.unsignedInteger()) {
-        if (value.type() != CMPI_char16)
-            return std::to_string(*number);
-        std::string character;
-        const auto code = static_cast<char32_t>(*number);
-        appendUtf8(character, isXmlCharacter(code) ? code : U'\xFFFD');
-        return character;
+    if (const auto text = value.text()) {
+        appendEscaped(out, *text);
+    } else if (const auto truth = value.boolean()) {
+        out += *truth ? "TRUE" : "FALSE";
+    } else if (const auto number = value.unsignedInteger()) {
+        if (value.type() == CMPI_char16)
+            appendCharacter(out, static_cast<char32_t>(*number));
+        else
+            appendNumber(out, *number);
+    } else if (const auto signedNumber = value.signedInteger()) {
+        appendNumber(out, *signedNumber);
+    } else if (const auto real = value.real()) {
+        if (value.type() == CMPI_real32)
+            appendReal(out, static_cast<float>(*real));
+        else
+            appendReal(out, *real);
+    } else if (const DateTime* const time = value.dateTime()) {
+        out += time->toText();
     }
-    if (const auto number = value.signedInteger())
-        return std::to_string(*number);
-    if (const auto number = value.real())
-        return writeReal(value.type(), *number);
-    if (const DateTime* const time = value.dateTime())
-        return time->toText();
-    return {};
 }
 
 } // namespace Host::CimXml

@@ -31,8 +31,7 @@ std::optional<Value> readLiteral(Arena& arena, CMPIType type, std::string_view t
 // it is negative, real64 where it is no integer. Nothing when it is no number.
 std::optional<Value> readNumber(Arena& arena, std::string_view text);
 
-// As the content of VALUE or KEYVALUE, not yet escaped. Empty for a null, an array, a reference
-// or an instance.
-std::string writeLiteral(const Value& value);
+// As the content of VALUE or KEYVALUE. Nothing for a null, an array, a reference or an instance.
+void appendLiteral(std::string& out, const Value& value);
 
 } // namespace Host::CimXml

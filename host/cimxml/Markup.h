@@ -19,18 +19,29 @@ public:
     // The name must outlive it too.
     Markup(std::string& out, std::string_view name) : out_(out), name_(name)
     {
-        out_.append("<").append(name_).append(">");
+        out_ += '<';
+        out_ += name_;
+        out_ += '>';
     }
-    ~Markup() { out_.append("</").append(name_).append(">"); }
+    ~Markup()
+    {
+        out_ += '<';
+        out_ += '/';
+        out_ += name_;
+        out_ += '>';
+    }
     Markup(const Markup&) = delete;
     Markup& operator=(const Markup&) = delete;
 
     Markup& attribute(std::string_view name, std::string_view value)
     {
         out_.back() = ' ';
-        out_.append(name).append("=\"");
+        out_ += name;
+        out_ += '=';
+        out_ += '"';
         appendEscaped(out_, value);
-        out_.append("\">");
+        out_ += '"';
+        out_ += '>';
         return *this;
     }
 

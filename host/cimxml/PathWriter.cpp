@@ -37,6 +37,13 @@ std::string_view valueTypeOf(const Value& value)
     return isNumber ? "numeric" : "string";
 }
 
+void writeKeyValue(std::string& out, const Value& value)
+{
+    Markup element(out, "KEYVALUE");
+    element.attribute("VALUETYPE", valueTypeOf(value));
+    appendLiteral(out, value);
+}
+
 } // namespace
 
 void writeInstanceName(std::string& out, const ObjectPath& path)
@@ -51,9 +58,7 @@ void writeInstanceName(std::string& out, const ObjectPath& path)
         if (const ObjectPath* const reference = value.path())
             writeReference(out, *reference);
         else
-            Markup(out, "KEYVALUE")
-                .attribute("VALUETYPE", valueTypeOf(value))
-                .content(writeLiteral(value));
+            writeKeyValue(out, value);
     }
 }
 

@@ -23,17 +23,19 @@ constexpr std::array<std::pair<Scope, const char*>, 7> ScopeAttributes = {{
     {Scope::indication, "INDICATION"},
 }};
 
-std::string textOf(const Scalar& value, CMPIType type)
+void writeScalar(std::string& out, const Scalar& value, CMPIType type)
 {
+    const Markup element(out, "VALUE");
     if (const auto* const text = std::get_if<std::string>(&value))
-        return *text;
-    if (const auto* const truth = std::get_if<bool>(&value))
-        return writeLiteral(Value::boolean(*truth));
-    if (const auto* const number = std::get_if<std::int64_t>(&value))
-        return std::to_string(*number);
-    if (const auto* const number = std::get_if<std::uint64_t>(&value))
-        return writeLiteral(Value::integer(type, *number));
-    return writeLiteral(Value::real(type, std::get<double>(value)));
+        appendEscaped(out, *text);
+    else if (const auto* const truth = std::get_if<bool>(&value))
+        appendLiteral(out, Value::boolean(*truth));
+    else if (const auto* const number = std::get_if<std::int64_t>(&value))
+        out += std::to_string(*number);
+    else if (const auto* const magnitude = std::get_if<std::uint64_t>(&value))
+        appendLiteral(out, Value::integer(type, *magnitude));
+    else
+        appendLiteral(out, Value::real(type, std::get<double>(value)));
 }
 
 void writeFlavor(Markup& element, const Flavor& flavor)
@@ -76,13 +78,13 @@ void writeConstant(std::string& out, const Constant& value, CMPIType type)
     if (isNull(value))
         return;
     if (const Scalar* const scalar = std::get_if<Scalar>(&value)) {
-        Markup(out, "VALUE").content(textOf(*scalar, type));
+        writeScalar(out, *scalar, type);
         return;
     }
     const Markup element(out, "VALUE.ARRAY");
     for (const Scalar& each : std::get<std::vector<Scalar>>(value))
         if (!isNull(each))
-            Markup(out, "VALUE").content(textOf(each, elementType(type)));
+            writeScalar(out, each, elementType(type));
 }
 
 void writeQualifiers(

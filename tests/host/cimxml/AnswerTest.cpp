@@ -113,7 +113,7 @@ protected:
         const Host::CimXml::PropertySelection& selection = {})
     {
         std::string out;
-        writeInstance(out, instance, declared, selection);
+        Host::CimXml::InstanceWriter(selection).write(out, instance, declared);
         return out;
     }
 
@@ -133,6 +133,39 @@ TEST_F(AnswerTest, wrapsInstancesAsTheOperationDoes)
         {OperationKind::openEnumerateInstances, OperationKind::pullInstancesWithPath})
         EXPECT_EQ(instanceBy(kind),
             "<VALUE.INSTANCEWITHPATH>" + PathXml + InstanceXml + "</VALUE.INSTANCEWITHPATH>");
+}
+
+TEST_F(AnswerTest, writesAnInstanceTheSameWhateverWasWrittenBefore)
+{
+    const Host::ClassDeclaration* const thing = &Testing::classNamed(*repository, "Thing");
+    const Host::ClassDeclaration* const gauge = &Testing::classNamed(*repository, "Gauge");
+    const Value text = Value::text(request.arena(), "a");
+    const Value number = Value::integer(CMPI_uint16, 7);
+    const auto instanceWith = [this](const std::vector<std::pair<const char*, Value>>& properties) {
+        Host::Instance& made = emptyInstance();
+        for (const auto& [name, value] : properties)
+            made.setProperty(name, value);
+        return &made;
+    };
+    const std::vector<Host::Instance*> instances = {
+        instanceWith({{"Name", text}, {"Index", number}}),
+        instanceWith({{"Index", number}, {"Name", text}}),
+        instanceWith({{"Name", Value()}, {"Unknown", text}, {"Index", text}}),
+        instanceWith({}),
+        instanceWith({{"name", text}, {"INDEX", Value()}}),
+        instanceWith({{"Unknown", number}, {"Name", text}, {"Index", number}}),
+    };
+    Host::CimXml::PropertySelection selection;
+    selection.localOnly = true;
+    selection.includeQualifiers = true;
+    selection.includeClassOrigin = true;
+    Host::CimXml::InstanceWriter writer(selection);
+    for (const Host::ClassDeclaration* const declared : {thing, gauge, thing, {}, gauge})
+        for (const Host::Instance* const each : instances) {
+            std::string out;
+            writer.write(out, *each, declared);
+            EXPECT_EQ(out, instanceXml(*each, declared, selection));
+        }
 }
 
 TEST_F(AnswerTest, wrapsPathsAndClassNamesAsTheOperationDoes)
