@@ -254,18 +254,20 @@ void Exchange::wakeUp() noexcept
 ::ssize_t Exchange::read(char* to, std::size_t room) noexcept
 {
     try {
-        if (sent_ == piece_.size()) {
-            piece_.clear();
+        // The rest of a piece goes with the next one: each time the library is handed a little, it
+        // makes a packet of it.
+        if (answer_ && piece_.size() - sent_ < room) {
+            piece_.erase(0, sent_);
             sent_ = 0;
-            while (answer_ && piece_.size() < room)
-                if (!answer_->append(piece_))
-                    answer_.reset();
         }
+        while (answer_ && piece_.size() < room)
+            if (!answer_->append(piece_))
+                answer_.reset();
     } catch (...) {
         report({"read", "Exchange", __LINE__}, "an answer broke off");
         return MHD_CONTENT_READER_END_WITH_ERROR;
     }
-    if (piece_.empty())
+    if (sent_ == piece_.size())
         return MHD_CONTENT_READER_END_OF_STREAM;
     const std::size_t count = std::min(room, piece_.size() - sent_);
     std::memcpy(to, piece_.data() + sent_, count);
