@@ -1,0 +1,354 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// A client of this system on the server: it must print what `sensorctl --json` shows of the same
+// machine, for each of its operations.
+
+#include "tests/tools/Wbemcli.h"
+#include "tests/support/MountNamespace.h"
+#include "tests/support/TlsClient.h"
+#include "tests/tools/ServerProcess.h"
+#include "tests/tools/ToolTest.h"
+
+#include <gmock/gmock.h>
+
+#include <sys/stat.h>
+
+#include <optional>
+
+namespace {
+
+using nlohmann::json;
+using namespace Testing;
+using testing::Contains;
+using testing::Each;
+using testing::HasSubstr;
+
+constexpr const char* sensorClass = "ZUMLO_NumericSensor";
+constexpr const char* deviceClass = "ZUMLO_SensorSystemDevice";
+constexpr const char* elementClass = "ZUMLO_SensorElementCapabilities";
+const std::vector<std::string> objectClasses = {
+    sensorClass, "ZUMLO_ComputerSystem", "ZUMLO_SensorEnabledLogicalElementCapabilities"};
+const std::vector<std::string> associationClasses = {deviceClass, elementClass};
+
+// What is associated with an object: the other ends and the associations themselves.
+struct Associated {
+    PlainInstances ends;
+    PlainInstances links;
+};
+
+// On the demonstration model, and on the chips of a captured machine.
+class WbemcliTest : public MountNamespaceTest, public testing::WithParamInterface<const char*> {
+protected:
+    void SetUp() override
+    {
+        if (isModel()) {
+            source_ = {"--model", SENSOR_PROFILE_SOURCE_DIR "/schema/demo-model.json"};
+        } else {
+            MountNamespaceTest::SetUp();
+            if (IsSkipped() || HasFailure())
+                return;
+            sysfs_.emplace(Testing::sysfsTree(GetParam()));
+        }
+        server_.emplace(source_);
+    }
+
+    static bool isModel() { return GetParam() == std::string("demonstration"); }
+
+    std::string url(const std::string& object, const std::string& space = "root/cimv2") const
+    {
+        return "http://127.0.0.1:" + std::to_string(server_->port()) + "/" + space + ":" + object;
+    }
+
+    // The objects of a class as the tool shows them.
+    json listed(const std::string& name) const
+    {
+        std::vector<std::string> arguments = {"list", name, "--json"};
+        arguments.insert(arguments.end(), source_.begin(), source_.end());
+        const Ended ended = run(arguments);
+        EXPECT_EQ(ended.code, 0) << ended.err;
+        return json::parse(ended.out).at("instances");
+    }
+    PlainInstances plainListed(const std::string& name) const
+    {
+        PlainInstances instances;
+        for (const json& instance : listed(name))
+            instances.insert(plainInstance(instance));
+        EXPECT_FALSE(instances.empty()) << name;
+        return instances;
+    }
+
+    // The path of an object as a client types it: without where it is.
+    static std::string typed(const json& instance)
+    {
+        const std::string path = instance.at("path");
+        return path.substr(path.find("root/cimv2:") + std::string("root/cimv2:").size());
+    }
+
+    static std::string withWrongKey(std::string path)
+    {
+        const std::string key = "DeviceID=\"";
+        return path.insert(path.find(key) + key.size(), "no such ");
+    }
+
+    // What the client prints of an object, or of a class.
+    std::string answer(const std::string& operation, const std::string& object,
+        const std::vector<std::string>& options = {}, const std::string& properties = "") const
+    {
+        std::vector<std::string> arguments = {"-nl", operation};
+        arguments.insert(arguments.end(), options.begin(), options.end());
+        arguments.push_back(url(object));
+        if (!properties.empty())
+            arguments.push_back(properties);
+        const Ended ended = wbemcli(arguments);
+        EXPECT_EQ(ended.code, 0) << operation << ' ' << object << ended.err;
+        EXPECT_EQ(ended.err, "");
+        return ended.out;
+    }
+
+    PlainInstances plainListed(const std::vector<std::string>& names) const
+    {
+        PlainInstances instances;
+        for (const std::string& name : names)
+            instances.merge(plainListed(name));
+        return instances;
+    }
+
+    // From the association objects, which name both ends of each.
+    static Associated associatedWith(
+        const std::string& path, const PlainInstances& links, const PlainInstances& objects)
+    {
+        Associated associated;
+        for (const auto& link : links)
+            for (const auto& [role, end] : link.second) {
+                if (end != path)
+                    continue;
+                associated.links.insert(link);
+                for (const auto& [otherRole, other] : link.second)
+                    if (otherRole != role)
+                        associated.ends.insert(*objects.find(other));
+            }
+        return associated;
+    }
+
+    void expectRefused(const std::vector<std::string>& arguments, const std::string& code) const
+    {
+        const Ended ended = wbemcli(arguments);
+        EXPECT_EQ(ended.code, 16) << arguments[0];
+        EXPECT_EQ(ended.out, "") << arguments[0];
+        EXPECT_THAT(ended.err, HasSubstr("wbemcli: Cim: " + code + ": ")) << arguments[0];
+    }
+
+    std::vector<std::string> source_; // the options that say which machine
+    std::optional<BoundSysfs> sysfs_;
+    std::optional<ServerProcess> server_;
+};
+
+TEST_P(WbemcliTest, InstancesHaveThePropertiesThatTheToolLists)
+{
+    for (const auto& classes : {objectClasses, associationClasses})
+        for (const std::string& name : classes)
+            EXPECT_EQ(plainInstances(answer("ei", name)), plainListed(name)) << name;
+}
+
+TEST_P(WbemcliTest, NamesAreThePathsThatTheToolLists)
+{
+    for (const auto& classes : {objectClasses, associationClasses})
+        for (const std::string& name : classes)
+            EXPECT_EQ(plainPaths(answer("ein", name)), pathsOf(plainListed(name))) << name;
+}
+
+TEST_P(WbemcliTest, SuperclassesHaveTheSameInstances)
+{
+    EXPECT_EQ(plainInstances(answer("ei", "CIM_Sensor")), plainListed(sensorClass));
+    EXPECT_EQ(plainPaths(answer("ein", "CIM_NumericSensor")), pathsOf(plainListed(sensorClass)));
+}
+
+TEST_P(WbemcliTest, EachPathGivesItsInstance)
+{
+    for (const std::string& name : objectClasses)
+        for (const json& instance : listed(name))
+            EXPECT_EQ(plainInstances(answer("gi", typed(instance))),
+                PlainInstances({plainInstance(instance)}));
+}
+
+TEST_P(WbemcliTest, PropertyListLeavesTheRestOut)
+{
+    const json sensor = listed(sensorClass).at(0);
+    const auto [path, properties] = plainInstance(sensor);
+    EXPECT_EQ(plainInstances(answer("gi", typed(sensor), {}, "SensorType,Caption")),
+        PlainInstances({{path, {{"SensorType", properties.at("SensorType")},
+                                   {"Caption", properties.at("Caption")}}}}));
+}
+
+TEST_P(WbemcliTest, PropertyIsTheInstancesOwn)
+{
+    const json sensor = listed(sensorClass).at(0);
+    for (const auto& [name, value] : plainInstance(sensor).second)
+        EXPECT_EQ(
+            plain(answer("gp", typed(sensor), {}, name)), name == "Status" ? "" : value + "\n")
+            << name;
+    // Who asks for the Status alone gets none: it comes with the HealthState.
+    const PlainInstances both =
+        plainInstances(answer("gi", typed(sensor), {}, "HealthState,Status"));
+    EXPECT_EQ(both.begin()->second.at("Status"), plainInstance(sensor).second.at("Status"));
+}
+
+TEST_P(WbemcliTest, AssociationsLeadWhereTheirInstancesSay)
+{
+    const PlainInstances objects = plainListed(objectClasses);
+    const PlainInstances links = plainListed(associationClasses);
+    for (const std::string& name : objectClasses) {
+        const std::string path = typed(listed(name).at(0));
+        const Associated expected = associatedWith(plain(path), links, objects);
+        ASSERT_FALSE(expected.ends.empty()) << path;
+        EXPECT_EQ(plainInstances(answer("ai", path)), expected.ends) << path;
+        EXPECT_EQ(plainPaths(answer("ain", path)), pathsOf(expected.ends)) << path;
+        EXPECT_EQ(plainInstances(answer("ri", path)), expected.links) << path;
+        EXPECT_EQ(plainPaths(answer("rin", path)), pathsOf(expected.links)) << path;
+    }
+}
+
+TEST_P(WbemcliTest, AssociationsAreChosenByClassesAndRoles)
+{
+    const std::string sensor = typed(listed(sensorClass).at(0));
+    const Associated system =
+        associatedWith(plain(sensor), plainListed(deviceClass), plainListed(objectClasses));
+    const PlainPaths ends = pathsOf(system.ends);
+    const PlainPaths links = pathsOf(system.links);
+    ASSERT_EQ(ends.size(), 1U);
+    for (const auto& [option, value] : {std::pair("-ac", deviceClass), {"-ac", "CIM_SystemDevice"},
+             {"-ar", "PartComponent"}, {"-arc", "CIM_System"}, {"-arr", "GroupComponent"}}) {
+        EXPECT_EQ(plainPaths(answer("ain", sensor, {option, value})), ends) << option << value;
+        EXPECT_EQ(plainInstances(answer("ai", sensor, {option, value})), system.ends)
+            << option << value;
+    }
+    EXPECT_EQ(plainPaths(answer("rin", sensor, {"-arc", deviceClass})), links);
+    EXPECT_EQ(plainInstances(answer("ri", sensor, {"-ar", "PartComponent"})), system.links);
+    EXPECT_EQ(answer("ain", sensor, {"-ar", "GroupComponent"}), "");
+    EXPECT_EQ(answer("rin", sensor, {"-ar", "Capabilities"}), "");
+}
+
+TEST_P(WbemcliTest, ClassNamesItsSuperclassAndProperties)
+{
+    EXPECT_THAT(answer("gcd", sensorClass),
+        HasSubstr("<CLASS NAME=\"ZUMLO_NumericSensor\" SUPERCLASS=\"CIM_NumericSensor\">"));
+    const PlainInstances found = plainInstances(answer("gc", sensorClass));
+    ASSERT_EQ(found.size(), 1U);
+    EXPECT_EQ(found.begin()->first, sensorClass);
+    for (const auto& [name, value] : plainInstance(listed(sensorClass).at(0)).second)
+        EXPECT_TRUE(found.begin()->second.contains(name)) << name;
+}
+
+TEST_P(WbemcliTest, ClassesAreEnumerated)
+{
+    EXPECT_EQ(plainPaths(answer("ecn", "CIM_Sensor")),
+        PlainPaths({"CIM_NumericSensor", "ZUMLO_NumericSensor"}));
+    EXPECT_EQ(pathsOf(plainInstances(answer("ec", "CIM_Sensor"))),
+        PlainPaths({"CIM_NumericSensor : CIM_Sensor", "ZUMLO_NumericSensor : CIM_NumericSensor"}));
+    const PlainPaths all = plainPaths(answer("ecn", ""));
+    for (const auto& classes : {objectClasses, associationClasses})
+        for (const std::string& name : classes)
+            EXPECT_THAT(all, Contains(name).Times(1));
+    PlainPaths names;
+    for (const std::string& path : pathsOf(plainInstances(answer("ec", ""))))
+        names.insert(path.substr(0, path.find(' ')));
+    EXPECT_EQ(names, all);
+}
+
+TEST_P(WbemcliTest, ChangesAreNotSupported)
+{
+    const std::string before = answer("ei", sensorClass);
+    const std::string sensor = url(typed(listed(sensorClass).at(0)));
+    const std::string refusal = "(7) CIM_ERR_NOT_SUPPORTED";
+    for (const std::string operation : {"ci", "mi", "sp"})
+        expectRefused({operation, sensor, "Caption=\"changed\""}, refusal);
+    expectRefused({"di", sensor}, refusal);
+    expectRefused({"dc", url(sensorClass)}, refusal);
+    expectRefused({"cm", sensor, "Reset()"}, refusal);
+    EXPECT_EQ(answer("ei", sensorClass), before);
+}
+
+TEST_P(WbemcliTest, SourceOfAssociationsNeedNotExist)
+{
+    const std::string path = typed(listed(sensorClass).at(0));
+    const std::string wrong = withWrongKey(path);
+    EXPECT_EQ(plainInstances(answer("ai", wrong)), plainInstances(answer("ai", path)));
+    EXPECT_EQ(plainPaths(answer("ain", wrong)), plainPaths(answer("ain", path)));
+    for (const std::string operation : {"ri", "rin"}) {
+        const PlainPaths links = pathsOf(plainInstances(answer(operation, wrong)));
+        EXPECT_EQ(links.size(), 2U);
+        EXPECT_THAT(links, Each(HasSubstr("no such ")));
+    }
+}
+
+TEST_P(WbemcliTest, WhatIsNotThereIsRefused)
+{
+    const std::string wrong = withWrongKey(typed(listed(sensorClass).at(0)));
+    expectRefused({"gi", url(wrong)}, "(6) CIM_ERR_NOT_FOUND");
+    expectRefused({"gp", url(wrong), "Caption"}, "(6) CIM_ERR_NOT_FOUND");
+    for (const std::string operation : {"ei", "ein"}) {
+        expectRefused({operation, url("No_Class")}, "(5) CIM_ERR_INVALID_CLASS");
+        expectRefused({operation, url(sensorClass, "root/none")}, "(3) CIM_ERR_INVALID_NAMESPACE");
+    }
+    expectRefused({"gi", url("No_Class.Key=\"1\"")}, "(5) CIM_ERR_INVALID_CLASS");
+    expectRefused({"gc", url(sensorClass, "root/none")}, "(3) CIM_ERR_INVALID_NAMESPACE");
+    // Here the class itself is what is asked for.
+    expectRefused({"gc", url("No_Class")}, "(6) CIM_ERR_NOT_FOUND");
+}
+
+INSTANTIATE_TEST_SUITE_P(Machines, WbemcliTest, testing::Values("demonstration", "server"),
+    [](const auto& machine) { return machine.param; });
+
+class WbemcliSignInTest : public ToolTest {
+protected:
+    WbemcliSignInTest()
+    {
+        const std::string file = (folder_.path() / "one").string();
+        makeCertificate(file, "localhost");
+        // ann's is "secret", at the least cost.
+        const std::string passwords = folder_.write(
+            "passwords", "ann:$2b$04$abcdefghijklmnopqrstuu2r9OfJnfCsdneAXAGHnS4UpFFP8WIrW\n");
+        ::chmod(passwords.c_str(), 0600);
+        server_.emplace(std::vector<std::string>{"--model", smallModel(), "--certificate",
+            file + ".crt", "--key", file + ".key", "--passwords", passwords});
+    }
+
+    std::string urlAs(const std::string& who) const
+    {
+        return "https://" + who + "127.0.0.1:" + std::to_string(server_->port("https")) +
+               "/root/cimv2:ZUMLO_NumericSensor";
+    }
+
+    std::optional<ServerProcess> server_;
+};
+
+TEST_F(WbemcliSignInTest, PasswordOpensTheWholeAnswer)
+{
+    const Ended ended = wbemcli({"-nl", "-noverify", "ei", urlAs("ann:secret@")});
+    EXPECT_EQ(ended.code, 0) << ended.err;
+    const json document = json::parse(run({"list", "--json", "--model", smallModel()}).out);
+    PlainInstances expected;
+    for (const json& instance : document.at("instances"))
+        expected.insert(plainInstance(instance));
+    EXPECT_EQ(expected.size(), 5U);
+    EXPECT_EQ(plainInstances(ended.out), expected);
+}
+
+TEST_F(WbemcliSignInTest, WrongPasswordsOpenNothing)
+{
+    for (const std::string who : {"ann:wrong@", "bob:secret@", ""}) {
+        const Ended ended = wbemcli({"-nl", "-noverify", "ei", urlAs(who)});
+        EXPECT_NE(ended.code, 0) << who;
+        EXPECT_EQ(ended.out, "") << who;
+        EXPECT_THAT(ended.err, HasSubstr("wbemcli: Http Exception: ")) << who;
+    }
+}
+
+TEST_F(WbemcliSignInTest, UnknownCertificateIsTheClientsToRefuse)
+{
+    const Ended ended = wbemcli({"-nl", "ei", urlAs("ann:secret@")});
+    EXPECT_NE(ended.code, 0);
+    EXPECT_EQ(ended.out, "");
+}
+
+} // namespace
