@@ -1,0 +1,236 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// Clients that keep asking a server of its own process while a chip of the machine comes and goes:
+// every answer is whole and without error, and nothing stays behind in the server.
+// SENSOR_PROFILE_SOAK_SECONDS makes it longer.
+
+#include "platform/utilities/ProviderUtilities.h"
+#include "tests/support/HttpClient.h"
+#include "tests/support/MountNamespace.h"
+#include "tests/tools/ServerProcess.h"
+#include "tests/tools/ToolTest.h"
+
+#include <gmock/gmock.h>
+#include <pugixml.hpp>
+
+#include <atomic>
+#include <chrono>
+#include <functional>
+#include <thread>
+
+#if defined(__SANITIZE_THREAD__)
+#define SENSOR_PROFILE_THREAD_SANITIZER
+#elif defined(__has_feature)
+#if __has_feature(thread_sanitizer)
+#define SENSOR_PROFILE_THREAD_SANITIZER
+#endif
+#endif
+
+namespace {
+
+using namespace Testing;
+using namespace std::chrono_literals;
+using Clock = std::chrono::steady_clock;
+
+std::chrono::seconds soakTime()
+{
+    const char* const wanted = std::getenv("SENSOR_PROFILE_SOAK_SECONDS");
+    return std::chrono::seconds(wanted == nullptr ? 5 : std::atoi(wanted));
+}
+
+std::string callOf(const std::string& operation, const std::string& parameters)
+{
+    const std::string body =
+        R"(<CIM CIMVERSION="2.0" DTDVERSION="2.0"><MESSAGE ID="1" PROTOCOLVERSION="1.0">)"
+        R"(<SIMPLEREQ><IMETHODCALL NAME=")" +
+        operation +
+        R"("><LOCALNAMESPACEPATH><NAMESPACE NAME="root"/><NAMESPACE NAME="cimv2"/>)"
+        R"(</LOCALNAMESPACEPATH>)" +
+        parameters + "</IMETHODCALL></SIMPLEREQ></MESSAGE></CIM>";
+    return "POST /cimom HTTP/1.1\r\nHost: localhost\r\nContent-Type: application/xml\r\n"
+           "CIMOperation: MethodCall\r\nContent-Length: " +
+           std::to_string(body.size()) + "\r\n\r\n" + body;
+}
+
+std::string parameterOf(const std::string& name, const std::string& content)
+{
+    return "<IPARAMVALUE NAME=\"" + name + "\">" + content + "</IPARAMVALUE>";
+}
+
+using Keys = std::vector<std::pair<std::string, std::string>>;
+
+std::string objectOf(const std::string& name, const Keys& keys)
+{
+    std::string text = "<INSTANCENAME CLASSNAME=\"" + name + "\">";
+    for (const auto& [key, value] : keys)
+        text += "<KEYBINDING NAME=\"" + key + "\"><KEYVALUE>" + value + "</KEYVALUE></KEYBINDING>";
+    return text + "</INSTANCENAME>";
+}
+
+const std::string allSensors = callOf(
+    "EnumerateInstances", parameterOf("ClassName", "<CLASSNAME NAME=\"ZUMLO_NumericSensor\"/>"));
+
+std::string devicesOfTheSystem()
+{
+    return callOf("Associators",
+        parameterOf("ObjectName",
+            objectOf("ZUMLO_ComputerSystem",
+                {{"CreationClassName", "ZUMLO_ComputerSystem"}, {"Name", Vorn::getSystemName()}})));
+}
+
+// One of the chip that stays.
+std::string oneSensor()
+{
+    const std::string sensor = objectOf(
+        "ZUMLO_NumericSensor", {{"CreationClassName", "ZUMLO_NumericSensor"},
+                                   {"DeviceID", "Package id 0:/hwmon/coretemp-isa-0000/temp1"},
+                                   {"SystemCreationClassName", "ZUMLO_ComputerSystem"},
+                                   {"SystemName", Vorn::getSystemName()}});
+    return callOf("GetInstance", parameterOf("InstanceName", sensor));
+}
+
+// How many sensors the answer holds; -1 when it is no whole answer or tells of an error.
+int sensorsOf(const HttpReply& reply)
+{
+    pugi::xml_document document;
+    // The reader forgives an end that is cut off.
+    if (reply.status != 200 || !reply.body.ends_with("</CIM>\n") ||
+        !document.load_string(reply.body.c_str()) || !document.select_nodes("//ERROR").empty() ||
+        document.select_nodes("/CIM/MESSAGE/SIMPLERSP/IMETHODRESPONSE/IRETURNVALUE").size() != 1)
+        return -1;
+    return static_cast<int>(
+        document.select_nodes("//INSTANCE[@CLASSNAME='ZUMLO_NumericSensor']").size());
+}
+
+// What the answers had.
+struct Seen {
+    std::atomic<int> answers{0};
+    std::atomic<int> withChip{0};
+    std::atomic<int> withoutChip{0};
+};
+
+class ServeSoakTest : public MountNamespaceTest {
+protected:
+    void SetUp() override
+    {
+        MountNamespaceTest::SetUp();
+        if (IsSkipped() || HasFailure())
+            return;
+        sysfs_ = std::make_unique<BoundSysfs>(Testing::sysfsTree("hotplug"));
+        // Else the address sanitizer keeps what was freed, up to 256 MB.
+        server_ = std::make_unique<ServerProcess>(std::vector<std::string>{"--workers", "4"},
+            std::map<std::string, std::string>{
+                {"ASAN_OPTIONS", "quarantine_size_mb=1:thread_local_quarantine_size_kb=64"},
+                {"RYNLOG_LOG", "off"}});
+    }
+
+    // A connection asks some times, as one that stays for ever would hide a leak in each.
+    void askAll(const std::string& request, int least, int most)
+    {
+        HttpClient client(server_->port());
+        for (int i = 0; i < 10; ++i) {
+            client.send(request);
+            const HttpReply reply = client.receive();
+            const int sensors = sensorsOf(reply);
+            ++seen_.answers;
+            if (least != most)
+                ++(sensors == most ? seen_.withChip : seen_.withoutChip);
+            ASSERT_TRUE(sensors == least || sensors == most) << sensors << ' ' << reply.body;
+        }
+    }
+
+    void soak(Clock::duration time)
+    {
+        const auto end = Clock::now() + time;
+        std::vector<std::thread> clients;
+        const auto keep = [&](const std::string& request, int least, int most) {
+            clients.emplace_back([this, end, request, least, most] {
+                try {
+                    while (Clock::now() < end && !HasFailure())
+                        askAll(request, least, most);
+                } catch (const std::exception& error) {
+                    ADD_FAILURE() << error.what();
+                }
+            });
+        };
+        keep(allSensors, 2, 3);
+        keep(allSensors, 2, 3);
+        keep(devicesOfTheSystem(), 2, 3);
+        keep(oneSensor(), 1, 1);
+        while (Clock::now() < end) {
+            sysfs_->rename("hwmon/hwmon2", "gone");
+            std::this_thread::sleep_for(30ms);
+            sysfs_->rename("gone", "hwmon/hwmon2");
+            std::this_thread::sleep_for(30ms);
+        }
+        for (std::thread& client : clients)
+            client.join();
+    }
+
+    std::size_t residentKilobytes() const
+    {
+        const std::string status = contentOf("/proc/" + std::to_string(server_->id()) + "/status");
+        return std::stoul(status.substr(status.find("VmRSS:") + 6));
+    }
+
+    std::size_t descriptors() const
+    {
+        const std::string folder = "/proc/" + std::to_string(server_->id()) + "/fd";
+        return static_cast<std::size_t>(
+            std::distance(std::filesystem::directory_iterator(folder), {}));
+    }
+
+    // The server sees the end of connections a little after the clients.
+    bool waitForDescriptors(std::size_t count) const
+    {
+        for (const auto end = Clock::now() + 10s; descriptors() != count;) {
+            if (Clock::now() > end)
+                return false;
+            std::this_thread::sleep_for(10ms);
+        }
+        return true;
+    }
+
+    std::unique_ptr<BoundSysfs> sysfs_;
+    std::unique_ptr<ServerProcess> server_;
+    Seen seen_;
+};
+
+TEST_F(ServeSoakTest, ErrorsAreNotTakenForAnswers)
+{
+    HttpClient client(server_->port());
+    client.send(
+        callOf("EnumerateInstances", parameterOf("ClassName", "<CLASSNAME NAME=\"No_Class\"/>")));
+    const HttpReply error = client.receive();
+    EXPECT_EQ(error.status, 200);
+    EXPECT_EQ(sensorsOf(error), -1);
+    client.send(allSensors);
+    HttpReply cut = client.receive();
+    EXPECT_EQ(sensorsOf(cut), 3);
+    cut.body.resize(cut.body.size() - 1);
+    EXPECT_EQ(sensorsOf(cut), -1);
+}
+
+TEST_F(ServeSoakTest, NothingStaysBehindWhileTheMachineChanges)
+{
+    const std::size_t descriptorsBefore = descriptors();
+    soak(3s);
+    ASSERT_TRUE(waitForDescriptors(descriptorsBefore)) << descriptors();
+    const std::size_t residentBefore = residentKilobytes();
+    soak(soakTime());
+    EXPECT_TRUE(waitForDescriptors(descriptorsBefore)) << descriptors();
+    const std::size_t residentAfter = residentKilobytes();
+    RecordProperty("answers", seen_.answers);
+    RecordProperty("withoutChip", seen_.withoutChip);
+    RecordProperty("residentBefore", std::to_string(residentBefore));
+    RecordProperty("residentAfter", std::to_string(residentAfter));
+    EXPECT_GT(seen_.answers, 100);
+    EXPECT_GT(seen_.withChip, 0);
+    EXPECT_GT(seen_.withoutChip, 0);
+#ifndef SENSOR_PROFILE_THREAD_SANITIZER // its shadow grows with all that was ever touched
+    EXPECT_LT(residentAfter, residentBefore + 8 * 1024);
+#endif
+    EXPECT_EQ(server_->end(SIGTERM).code, 0) << server_->log();
+}
+
+} // namespace
