@@ -1,8 +1,9 @@
 # Each room of the source tree is one static library; includes are written from the root, so
 # that every include line names the room it reaches into.
 
-# The presets with sanitizers compile several files of a target as one, in a fraction of the time.
-# FILES_APART is for targets whose files use the same names, each for something of its own.
+# The presets compile several files of a target as one, in a fraction of the time; only `coverage`
+# compiles each by itself. FILES_APART is for targets whose files use the same names, each for
+# something of its own.
 
 # sensor_profile_room(NAME [FILES_APART] SOURCES ... [USES public libraries ...] [PRIVATELY private libraries ...])
 function(sensor_profile_room name)

@@ -17,6 +17,10 @@ add_link_options(-Wl,-z,relro,-z,now)
 # Unique symbols would keep the provider library in memory after dlclose.
 if(CMAKE_CXX_COMPILER_ID STREQUAL "GNU")
   add_compile_options(-fno-gnu-unique)
+  if(CMAKE_UNITY_BUILD)
+    # GCC takes files that are compiled as one for headers.
+    add_compile_options(-Wno-subobject-linkage)
+  endif()
 endif()
 
 if(SENSOR_PROFILE_SANITIZE)

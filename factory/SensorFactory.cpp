@@ -15,22 +15,21 @@ const std::string loggerSensorFactory = "Nimbrel.SensorFactory";
 
 namespace {
 
-// A map holds a copy of the last record of each key. The count is cut to 16 bits. Inserted in
-// the order of their keys the records lie in memory as they are walked later; in harvest order
-// every step of ten thousand would miss the cache.
+// A map holds the last record of each key, moved out of the harvest: nothing asks for that again.
+// The count is cut to 16 bits. Inserted in the order of their keys the records lie in memory as
+// they are walked later; in harvest order every step of ten thousand would miss the cache.
 template <typename Record, typename KeyOf>
-void indexRecords(
-    const std::vector<Record>& records, std::map<std::string, Record>& byKey, KeyOf keyOf)
+void indexRecords(std::vector<Record>& records, std::map<std::string, Record>& byKey, KeyOf keyOf)
 {
     const auto count = static_cast<std::uint16_t>(records.size());
-    std::vector<std::pair<std::string, const Record*>> ordered;
+    std::vector<std::pair<std::string, Record*>> ordered;
     ordered.reserve(count);
     for (std::uint16_t i = 0; i < count; ++i)
         ordered.emplace_back(keyOf(records[i]), &records[i]);
     std::stable_sort(ordered.begin(), ordered.end(),
         [](const auto& one, const auto& other) { return one.first < other.first; });
     for (auto& [key, record] : ordered)
-        byKey.insert_or_assign(byKey.end(), std::move(key), *record);
+        byKey.insert_or_assign(byKey.end(), std::move(key), std::move(*record));
 }
 
 } // namespace

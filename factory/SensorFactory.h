@@ -97,7 +97,8 @@ private:
     void _createSensorMap();
     void _createEnabledLogicalElementCapMap();
 
-    std::vector<Sensor> vectSensor; // in harvest order, duplicates included
+    // In harvest order, duplicates included; their content is in the maps once these are made.
+    std::vector<Sensor> vectSensor;
     std::vector<SensorEnabledLogCap> vectSensorEnabledLogCap;
     std::map<std::string, Sensor> sensorMap; // by device identifier; the later duplicate wins
     std::map<std::string, SensorEnabledLogCap> sensorEnabledLogCapMap; // by instance identifier
