@@ -6,7 +6,7 @@
 #include "tests/support/FaultSweep.h"
 #include "tests/support/ProviderTest.h"
 
-namespace {
+namespace ComputerSystemFaultTests {
 
 using Testing::BrokerCall;
 using Testing::FaultManner;
@@ -128,4 +128,4 @@ TEST(ComputerSystemFaultTest, anArrayThatCannotBeMadeLeavesItsPropertyOut)
     EXPECT_EQ(Testing::property(*request.answer.instances()[0], "EnabledState"), "uint16 2");
 }
 
-} // namespace
+} // namespace ComputerSystemFaultTests

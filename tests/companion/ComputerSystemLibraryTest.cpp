@@ -15,7 +15,7 @@
 
 #include <dlfcn.h>
 
-namespace {
+namespace ComputerSystemLibraryTests {
 
 const std::string library = SENSOR_PROFILE_BINARY_DIR "/lib/libComputerSystemProvider.so";
 
@@ -52,4 +52,4 @@ TEST(ComputerSystemLibrary, isUsedAndUnloadedOverAndOver)
     EXPECT_FALSE(isLoaded());
 }
 
-} // namespace
+} // namespace ComputerSystemLibraryTests

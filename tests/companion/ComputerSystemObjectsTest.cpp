@@ -6,7 +6,7 @@
 
 #include <gmock/gmock.h>
 
-namespace {
+namespace ComputerSystemObjectsTests {
 
 using Testing::describe;
 using ::testing::ElementsAre;
@@ -73,4 +73,4 @@ TEST_F(ComputerSystemObjectsTest, theComputerHasTheSystemNameOfItsSensors)
     EXPECT_EQ(Vorn::Companion::thisComputerSystem().name, systemName_);
 }
 
-} // namespace
+} // namespace ComputerSystemObjectsTests

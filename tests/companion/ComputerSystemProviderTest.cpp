@@ -7,7 +7,7 @@
 
 #include <gmock/gmock.h>
 
-namespace {
+namespace ComputerSystemProviderTests {
 
 constexpr const char* Class = "ZUMLO_ComputerSystem";
 
@@ -156,4 +156,4 @@ TEST_F(ComputerSystemProviderTest, theFactoryRefusesToWorkWithoutABroker)
     expectFound(get(path(Class, keys()))); // with the broker of before
 }
 
-} // namespace
+} // namespace ComputerSystemProviderTests

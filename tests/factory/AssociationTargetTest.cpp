@@ -10,7 +10,7 @@
 
 #include <gmock/gmock.h>
 
-namespace {
+namespace AssociationTargetTests {
 
 using Vorn::SensorProfileProvider::SensorFactory;
 using namespace ::testing;
@@ -264,4 +264,4 @@ TEST(ClassNames, areTheOnesOfTheSchema)
     EXPECT_STREQ(SensorEnabledLogicalElementCapClass, Capabilities);
 }
 
-} // namespace
+} // namespace AssociationTargetTests

@@ -8,7 +8,7 @@
 
 #include <gmock/gmock.h>
 
-namespace {
+namespace CapabilitiesEnumerationTests {
 
 using namespace Vorn::SensorProfileProvider;
 using Testing::BrokerCall;
@@ -307,4 +307,4 @@ TEST_F(CapabilitiesEnumerationTest, anObjectPathThatCannotBeMadeLeavesTheExiting
         ElementsAre(traced(PathsOperation, "ENTERING", 1041, PathsParameters)));
 }
 
-} // namespace
+} // namespace CapabilitiesEnumerationTests

@@ -8,7 +8,7 @@
 
 #include <gmock/gmock.h>
 
-namespace {
+namespace CapabilitiesInstanceBuilderTests {
 
 using namespace Vorn::SensorProfileProvider;
 using Testing::BrokerCall;
@@ -238,4 +238,4 @@ TEST_F(CapabilitiesInstanceBuilderTest, isTracedWithItsParameters)
     EXPECT_EQ(Testing::withoutPointers(capture.log()), expected);
 }
 
-} // namespace
+} // namespace CapabilitiesInstanceBuilderTests

@@ -7,7 +7,7 @@
 
 #include <gmock/gmock.h>
 
-namespace {
+namespace SensorEnumerationTests {
 
 using namespace Vorn::SensorProfileProvider;
 using Testing::BrokerMessage;
@@ -260,4 +260,4 @@ TEST_F(EmptyMachineTest, hasItsObjectPathsTracedToo)
     EXPECT_EQ(linesOf(capture, "getAllSensorCMPIObjPaths").size(), 2U);
 }
 
-} // namespace
+} // namespace SensorEnumerationTests

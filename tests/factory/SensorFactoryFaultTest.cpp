@@ -9,7 +9,7 @@
 #include <cmpimacs.h>
 #include <gmock/gmock.h>
 
-namespace {
+namespace SensorFactoryFaultTests {
 
 using namespace Vorn::SensorProfileProvider;
 using Testing::BrokerCall;
@@ -165,4 +165,4 @@ TEST_F(SensorFactoryFaultTest, anUnknownIdentifierLeavesTheStatusAsTheBrokerMade
     EXPECT_THAT(messages_, IsEmpty());
 }
 
-} // namespace
+} // namespace SensorFactoryFaultTests

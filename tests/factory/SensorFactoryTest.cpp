@@ -10,7 +10,7 @@
 
 #include <gmock/gmock.h>
 
-namespace {
+namespace SensorFactoryTests {
 
 using namespace Vorn::SensorProfileProvider;
 using ::testing::ElementsAre;
@@ -150,4 +150,4 @@ TEST(SensorFactoryTrace, sensorsAreHarvestedBeforeCapabilities)
                                "getSensorEnabledLogCapInstances"));
 }
 
-} // namespace
+} // namespace SensorFactoryTests

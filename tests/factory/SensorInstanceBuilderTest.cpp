@@ -7,7 +7,7 @@
 
 #include <gmock/gmock.h>
 
-namespace {
+namespace SensorInstanceBuilderTests {
 
 using namespace Vorn::SensorProfileProvider;
 using ::testing::Contains;
@@ -269,4 +269,4 @@ TEST_F(SensorInstanceBuilderTest, isTracedWithItsParameters)
                 parameters));
 }
 
-} // namespace
+} // namespace SensorInstanceBuilderTests

@@ -6,7 +6,7 @@
 
 #include <gmock/gmock.h>
 
-namespace {
+namespace AssociationRoundTripTests {
 
 using namespace Testing;
 
@@ -137,4 +137,4 @@ TEST_P(AssociationRoundTripTest, fromAssociatorsOfEitherEndToInstancesAndBack)
     }
 }
 
-} // namespace
+} // namespace AssociationRoundTripTests

@@ -5,7 +5,7 @@
 #include "providers/AssociationRequests.h"
 #include "tests/support/ProviderTest.h"
 
-namespace {
+namespace BrokerValuesTests {
 
 using namespace Vorn::SensorProfileProvider;
 using Testing::ProviderTest;
@@ -98,4 +98,4 @@ TEST_F(BrokerValuesTest, anInstanceIsAnInstanceOfAGoodStateWithAHandle)
     EXPECT_EQ(instanceOf(data), nullptr);
 }
 
-} // namespace
+} // namespace BrokerValuesTests

@@ -7,7 +7,7 @@
 
 #include <gmock/gmock.h>
 
-namespace {
+namespace CapabilitiesProviderFaultTests {
 
 using ::testing::ElementsAre;
 using namespace Testing;
@@ -174,4 +174,4 @@ TEST_F(CapabilitiesProviderFaultTest, aFailureWhoseMessageCannotBeMadeHasNone)
     EXPECT_EQ(request->status.msg, nullptr);
 }
 
-} // namespace
+} // namespace CapabilitiesProviderFaultTests

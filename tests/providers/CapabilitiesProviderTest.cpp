@@ -7,7 +7,7 @@
 
 #include <gmock/gmock.h>
 
-namespace {
+namespace CapabilitiesProviderTests {
 
 using Testing::BrokerMessage;
 using Testing::describe;
@@ -223,4 +223,4 @@ TEST_F(CapabilitiesProviderTest, theBrokerOfTheLastFactoryCallIsUsed)
     EXPECT_TRUE(messages_.empty());
 }
 
-} // namespace
+} // namespace CapabilitiesProviderTests

@@ -8,7 +8,7 @@
 
 #include <gmock/gmock.h>
 
-namespace {
+namespace CapabilitiesProviderTraceTests {
 
 using ::testing::ElementsAreArray;
 using namespace Testing;
@@ -122,4 +122,4 @@ TEST_F(CapabilitiesProviderTraceTest, ofARequestWithoutKeysHasNoFactory)
     EXPECT_THAT(traceOfOne({}), ElementsAreArray(sequence({lines.entry(191), lines.exit(283)})));
 }
 
-} // namespace
+} // namespace CapabilitiesProviderTraceTests

@@ -6,7 +6,7 @@
 
 #include <gmock/gmock.h>
 
-namespace {
+namespace ElementCapabilitiesAssociationTests {
 
 using namespace Testing;
 using ::testing::ElementsAre;
@@ -294,4 +294,4 @@ TEST_F(ElementCapabilitiesWithoutSensorsTest, referencesOfCapabilitiesAreAnOpenE
     EXPECT_THAT(pairs(), ElementsAre("A:/1 " + Cap));
 }
 
-} // namespace
+} // namespace ElementCapabilitiesAssociationTests

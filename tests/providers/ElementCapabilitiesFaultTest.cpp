@@ -8,7 +8,7 @@
 
 #include <gmock/gmock.h>
 
-namespace {
+namespace ElementCapabilitiesFaultTests {
 
 using namespace Testing;
 using ::testing::ElementsAre;
@@ -346,4 +346,4 @@ TEST_F(ElementCapabilitiesFaultTest, aMissingArrayStandsInTheStatusBesideTheAsso
     EXPECT_EQ(request->answer.instances()[0]->properties().size(), 2U);
 }
 
-} // namespace
+} // namespace ElementCapabilitiesFaultTests

@@ -7,7 +7,7 @@
 
 #include <gmock/gmock.h>
 
-namespace {
+namespace ElementCapabilitiesInstanceTests {
 
 using namespace Testing;
 using ::testing::ElementsAre;
@@ -288,4 +288,4 @@ TEST_F(ElementCapabilitiesInstanceTest, everyNameThatIsEnumeratedCanBeFetched)
             got(*name), ElementsAre(nameOf(*name->key("ManagedElement")->path()) + " " + Cap));
 }
 
-} // namespace
+} // namespace ElementCapabilitiesInstanceTests

@@ -7,7 +7,7 @@
 
 #include <gmock/gmock.h>
 
-namespace {
+namespace ElementCapabilitiesTraceTests {
 
 using namespace Testing;
 using ::testing::ElementsAreArray;
@@ -189,4 +189,4 @@ TEST_F(ElementCapabilitiesTraceTest, ofASourceWithoutTarget)
         ElementsAreArray(expected("ReferenceNames", "ReferenceNames")));
 }
 
-} // namespace
+} // namespace ElementCapabilitiesTraceTests

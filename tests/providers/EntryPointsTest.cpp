@@ -9,7 +9,7 @@
 
 #include <string>
 
-namespace {
+namespace EntryPointsTests {
 
 using InstanceFactory = CMPIInstanceMI* (*)(const CMPIBroker*, const CMPIContext*, CMPIStatus*);
 using AssociationFactory = CMPIAssociationMI* (*)(const CMPIBroker*, const CMPIContext*,
@@ -164,4 +164,4 @@ TEST_P(InstanceEntryTest, writingAndQueryingAreNotSupportedWhateverTheArgumentsA
     EXPECT_TRUE(capture.log().empty());
 }
 
-} // namespace
+} // namespace EntryPointsTests

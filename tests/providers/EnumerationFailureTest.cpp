@@ -8,7 +8,7 @@
 
 #include <gmock/gmock.h>
 
-namespace {
+namespace EnumerationFailureTests {
 
 using ::testing::ElementsAreArray;
 using namespace Testing;
@@ -102,4 +102,4 @@ TEST_F(EnumerationFailureTest, endsTheSearchForCapabilities)
     expectGivenUp();
 }
 
-} // namespace
+} // namespace EnumerationFailureTests

@@ -22,7 +22,7 @@
 #include <string>
 #include <thread>
 
-namespace {
+namespace HwmonRequestsTests {
 
 using Testing::BoundSysfs;
 
@@ -108,4 +108,4 @@ TEST_F(HwmonRequests, aChipThatIsGoneIsNotInTheNextAnswer)
         EXPECT_FALSE(device.ends_with(chipsSensor)) << device;
 }
 
-} // namespace
+} // namespace HwmonRequestsTests

@@ -6,7 +6,7 @@
 
 #include <gmock/gmock.h>
 
-namespace {
+namespace ManySensorsTests {
 
 using namespace Testing;
 using ::testing::ElementsAre;
@@ -69,4 +69,4 @@ TEST_F(SystemDeviceOf65537SensorsTest, thereIsOnePairForEachSystem)
     EXPECT_EQ(answer_.instances().size(), 2U);
 }
 
-} // namespace
+} // namespace ManySensorsTests

@@ -9,7 +9,7 @@
 
 #include <utility>
 
-namespace {
+namespace ProviderLifeTests {
 
 using ::testing::Each;
 using ::testing::IsEmpty;
@@ -182,4 +182,4 @@ TEST_P(BothKindsTest, cleaningUpAssociationsWritesNoLine)
     expectUntouched(capture);
 }
 
-} // namespace
+} // namespace ProviderLifeTests

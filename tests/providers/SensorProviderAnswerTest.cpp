@@ -12,7 +12,7 @@
 
 #include <functional>
 
-namespace {
+namespace SensorProviderAnswerTests {
 
 using Testing::BrokerCall;
 using ::testing::Contains;
@@ -178,4 +178,4 @@ TEST_F(SensorProviderAnswerTest, anExceptionThatIsNoStandardOneLeavesWithoutAnEx
     }
 }
 
-} // namespace
+} // namespace SensorProviderAnswerTests

@@ -7,7 +7,7 @@
 
 #include <gmock/gmock.h>
 
-namespace {
+namespace SensorProviderFaultTests {
 
 using Testing::BrokerCall;
 using Testing::BrokerMessage;
@@ -338,4 +338,4 @@ TEST_F(SensorProviderFaultTest, aFailureWhoseMessageCannotBeMadeHasNone)
     EXPECT_EQ(request->status.msg, nullptr);
 }
 
-} // namespace
+} // namespace SensorProviderFaultTests

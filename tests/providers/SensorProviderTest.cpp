@@ -6,7 +6,7 @@
 
 #include <gmock/gmock.h>
 
-namespace {
+namespace SensorProviderTests {
 
 using Testing::BrokerMessage;
 using ::testing::ElementsAre;
@@ -228,4 +228,4 @@ TEST_F(SensorProviderTest, theBrokerOfTheLastFactoryCallIsUsed)
     EXPECT_TRUE(messages_.empty());
 }
 
-} // namespace
+} // namespace SensorProviderTests

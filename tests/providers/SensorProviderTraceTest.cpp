@@ -7,7 +7,7 @@
 
 #include <gmock/gmock.h>
 
-namespace {
+namespace SensorProviderTraceTests {
 
 using ::testing::ElementsAre;
 using ::testing::ElementsAreArray;
@@ -147,4 +147,4 @@ TEST_F(SensorProviderTraceTest, failuresStandInTheHandlersModule)
                     "SensorProvider, Line: 94]: getAllSensorCMPIObjPaths failed"));
 }
 
-} // namespace
+} // namespace SensorProviderTraceTests

@@ -7,7 +7,7 @@
 
 #include <gmock/gmock.h>
 
-namespace {
+namespace SystemDeviceAssociationFaultTests {
 
 using namespace Testing;
 using namespace Testing::SystemDevice;
@@ -31,7 +31,7 @@ TEST_P(SystemDeviceFaultSweep, isSurvivedAndAnswersWithNothingMadeUp)
         const FaultyRequest request(broker_, faulty, GetParam());
         EXPECT_LE(request.answer.paths().size() + request.answer.instances().size(), 4U);
         expectWellFormed(request, Class,
-            {{"GroupComponent", SystemClass}, {"PartComponent", "ZUMLO_NumericSensor"}});
+            {{"GroupComponent", GroupClass}, {"PartComponent", "ZUMLO_NumericSensor"}});
     });
 }
 
@@ -170,4 +170,4 @@ TEST_F(SystemDeviceAssociationFaultTest, aReferenceThatCannotBeMadeIsLeftOut)
             }
 }
 
-} // namespace
+} // namespace SystemDeviceAssociationFaultTests

@@ -6,7 +6,7 @@
 
 #include <gmock/gmock.h>
 
-namespace {
+namespace SystemDeviceAssociationTests {
 
 using namespace Testing;
 using ::testing::ElementsAre;
@@ -335,4 +335,4 @@ TEST_F(SystemDeviceAssociationTest, elementsOfAnotherTypeAreLeftOutOfNames)
     EXPECT_EQ(answer_.refused(), 0U);
 }
 
-} // namespace
+} // namespace SystemDeviceAssociationTests

@@ -13,7 +13,7 @@
 namespace Testing::SystemDevice {
 
 inline constexpr const char* Class = "ZUMLO_SensorSystemDevice";
-inline constexpr const char* SystemClass = "ZUMLO_ComputerSystem";
+inline constexpr const char* GroupClass = "ZUMLO_ComputerSystem";
 inline constexpr const char* Provider = "SensorSystemDeviceProvider";
 
 inline const AssociationKinds Kinds = {

@@ -6,7 +6,7 @@
 
 #include <gmock/gmock.h>
 
-namespace {
+namespace SystemDeviceInstanceFaultTests {
 
 using namespace Testing;
 using namespace Testing::SystemDevice;
@@ -205,4 +205,4 @@ TEST_F(SystemDeviceInstanceFaultTest, anInstanceThatCannotBeMadeIsPassedOnButPas
     }
 }
 
-} // namespace
+} // namespace SystemDeviceInstanceFaultTests

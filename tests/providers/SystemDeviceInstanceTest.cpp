@@ -7,7 +7,7 @@
 
 #include <gmock/gmock.h>
 
-namespace {
+namespace SystemDeviceInstanceTests {
 
 using namespace Testing;
 using ::testing::ElementsAre;
@@ -285,4 +285,4 @@ TEST_F(SystemDeviceInstanceTest, everyNameThatIsEnumeratedCanBeFetched)
         EXPECT_THAT(got(*answer_.paths()[i]), ElementsAre(AllPairs[i]));
 }
 
-} // namespace
+} // namespace SystemDeviceInstanceTests

@@ -7,7 +7,7 @@
 
 #include <gmock/gmock.h>
 
-namespace {
+namespace SystemDeviceTraceTests {
 
 using namespace Testing;
 using ::testing::ElementsAreArray;
@@ -227,4 +227,4 @@ TEST_F(SystemDeviceTraceTest, ofARefusedUpcallHasNoExitMark)
     EXPECT_EQ(ownLines(traceOf([&] { referenceNames(source); })), expected("ReferenceNames"));
 }
 
-} // namespace
+} // namespace SystemDeviceTraceTests

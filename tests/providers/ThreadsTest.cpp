@@ -15,7 +15,7 @@
 
 #include <thread>
 
-namespace {
+namespace ThreadsTests {
 
 using Vorn::NodeLexicon::NodeType;
 
@@ -40,4 +40,4 @@ TEST(ProviderThreads, aFactoryMayRunBesideRequests)
     }
 }
 
-} // namespace
+} // namespace ThreadsTests

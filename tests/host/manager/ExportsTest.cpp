@@ -8,7 +8,7 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
-namespace {
+namespace ExportsTests {
 
 TEST(Exports, AreTheSixFactoriesAndNothingElse)
 {
@@ -22,4 +22,4 @@ TEST(Exports, AreTheSixFactoriesAndNothingElse)
             "SensorSystemDeviceProvider_Create_AssociationMI"));
 }
 
-} // namespace
+} // namespace ExportsTests

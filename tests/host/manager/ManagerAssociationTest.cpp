@@ -4,7 +4,7 @@
 
 #include "tests/host/manager/ManagerTest.h"
 
-namespace {
+namespace ManagerAssociationTests {
 
 using ::testing::ElementsAre;
 using ::testing::IsEmpty;
@@ -192,4 +192,4 @@ TEST_F(ManagerAssociationTest, aFailureWithoutAnyAnswerIsPassedOn)
     EXPECT_FALSE(answer_.isDone());
 }
 
-} // namespace
+} // namespace ManagerAssociationTests

@@ -4,7 +4,7 @@
 
 #include "tests/host/manager/ManagerTest.h"
 
-namespace {
+namespace ManagerInstanceTests {
 
 using ::testing::ElementsAre;
 using ::testing::HasSubstr;
@@ -215,4 +215,4 @@ TEST_F(ManagerInstanceTest, whereNothingAtAllIsFoundTheFirstFailureIsTheAnswer)
         "code 1: first");
 }
 
-} // namespace
+} // namespace ManagerInstanceTests

@@ -10,7 +10,7 @@
 #include <atomic>
 #include <thread>
 
-namespace {
+namespace ManagerThreadsTests {
 
 using Testing::ProviderCall;
 
@@ -92,4 +92,4 @@ TEST(LoadedProvidersThreads, makeEachInterfaceOnce)
     ::dlclose(witness);
 }
 
-} // namespace
+} // namespace ManagerThreadsTests

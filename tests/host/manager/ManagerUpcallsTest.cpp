@@ -4,7 +4,7 @@
 
 #include "tests/host/manager/ManagerTest.h"
 
-namespace {
+namespace ManagerUpcallsTests {
 
 using ::testing::ElementsAre;
 using Testing::ProviderCall;
@@ -172,4 +172,4 @@ TEST_F(ManagerUpcallsTest, theBrokerSaysWhatItOffers)
     EXPECT_EQ(broker()->bft->brokerCapabilities & wanted, wanted);
 }
 
-} // namespace
+} // namespace ManagerUpcallsTests

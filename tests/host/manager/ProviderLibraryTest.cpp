@@ -17,7 +17,7 @@
 #include <optional>
 #include <stdexcept>
 
-namespace {
+namespace ProviderLibraryTests {
 
 using testing::AllOf;
 using testing::HasSubstr;
@@ -169,4 +169,4 @@ TEST_F(ProviderLibraryTest, DescribesAStatusWithAndWithoutMessage)
     EXPECT_EQ(Host::describe({CMPI_RC_ERR_NOT_FOUND, &handleless}), "code 6");
 }
 
-} // namespace
+} // namespace ProviderLibraryTests

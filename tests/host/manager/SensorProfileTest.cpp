@@ -19,7 +19,7 @@
 
 #include <thread>
 
-namespace {
+namespace SensorProfileTests {
 
 using testing::HasSubstr;
 
@@ -132,4 +132,4 @@ TEST_F(SensorProfileTest, eightThreadsWalkAtOnce)
         thread.join();
 }
 
-} // namespace
+} // namespace SensorProfileTests

@@ -22,7 +22,7 @@
 #include <fstream>
 #include <iterator>
 
-namespace {
+namespace UnloadTests {
 
 #if defined(__SANITIZE_ADDRESS__) || defined(__SANITIZE_THREAD__)
 constexpr bool isSanitized = true;
@@ -156,4 +156,4 @@ TEST_F(Unload, ThousandUsesOnThisMachineLeaveNothingBehind)
     useManyTimes("hwmon,model:" + folder_.write("model.json", model), sensors + 3);
 }
 
-} // namespace
+} // namespace UnloadTests

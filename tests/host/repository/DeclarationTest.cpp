@@ -8,7 +8,7 @@
 
 #include <cmpidt.h>
 
-namespace {
+namespace DeclarationTests {
 
 using Host::Scope;
 using Testing::classNamed;
@@ -203,4 +203,4 @@ TEST(DeclarationTest, linesEndWithOrWithoutCarriageReturn)
     EXPECT_EQ(Host::toText(propertyNamed(*repository, "A", "P").position), "test.mof:3:9");
 }
 
-} // namespace
+} // namespace DeclarationTests

@@ -8,7 +8,7 @@
 
 #include <cmpidt.h>
 
-namespace {
+namespace InheritanceTests {
 
 using Testing::classNamed;
 using Testing::compile;
@@ -168,4 +168,4 @@ TEST(QualifierPropagationTest, whatMayNotBeOverriddenMayBeRepeated)
     EXPECT_FALSE(length->flavor.isOverridable); // for the next subclass too
 }
 
-} // namespace
+} // namespace InheritanceTests

@@ -6,7 +6,7 @@
 
 #include <gmock/gmock.h>
 
-namespace {
+namespace LimitsTests {
 
 using Testing::classNamed;
 using Testing::compile;
@@ -90,4 +90,4 @@ TEST(LimitsTest, longTextsAreReadWholeAndQuotedInPart)
             repeated("x", 40) + "...\"");
 }
 
-} // namespace
+} // namespace LimitsTests

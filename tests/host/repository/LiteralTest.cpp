@@ -6,7 +6,7 @@
 
 #include <limits>
 
-namespace {
+namespace LiteralTests {
 
 using Host::Scalar;
 using Testing::constant;
@@ -161,4 +161,4 @@ TEST(LiteralTest, valuesOfAnotherTypeAreRefusedWhereTheyStand)
     EXPECT_EQ(refused("uint8 P", "{1}"), "test.mof:3:2: a list is no value of type uint8");
 }
 
-} // namespace
+} // namespace LiteralTests

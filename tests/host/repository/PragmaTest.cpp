@@ -7,7 +7,7 @@
 
 #include <filesystem>
 
-namespace {
+namespace PragmaTests {
 
 using Testing::NameSpace;
 using Testing::TemporaryFolder;
@@ -184,4 +184,4 @@ TEST_F(PragmaTest, otherPragmasHaveNoEffect)
         "no error");
 }
 
-} // namespace
+} // namespace PragmaTests

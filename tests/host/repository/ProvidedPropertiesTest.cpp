@@ -16,7 +16,7 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
-namespace {
+namespace ProvidedPropertiesTests {
 
 using ::testing::UnorderedElementsAreArray;
 
@@ -71,4 +71,4 @@ INSTANTIATE_TEST_SUITE_P(Classes, ProvidedPropertiesTest,
     ::testing::Values("ZUMLO_NumericSensor", "ZUMLO_SensorEnabledLogicalElementCapabilities",
         "ZUMLO_SensorElementCapabilities", "ZUMLO_SensorSystemDevice", "ZUMLO_ComputerSystem"));
 
-} // namespace
+} // namespace ProvidedPropertiesTests

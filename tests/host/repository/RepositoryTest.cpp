@@ -9,7 +9,7 @@
 #include <atomic>
 #include <thread>
 
-namespace {
+namespace RepositoryTests {
 
 using ::testing::ElementsAre;
 using ::testing::IsEmpty;
@@ -131,4 +131,4 @@ TEST_F(RepositoryTest, answersManyThreadsAtOnce)
     EXPECT_EQ(right, 2000);
 }
 
-} // namespace
+} // namespace RepositoryTests

@@ -4,7 +4,7 @@
 
 #include "tests/host/repository/MofTest.h"
 
-namespace {
+namespace SemanticErrorTests {
 
 using Testing::errorOf;
 
@@ -147,4 +147,4 @@ INSTANTIATE_TEST_SUITE_P(Features, SemanticErrorTest, ::testing::ValuesIn(Featur
 INSTANTIATE_TEST_SUITE_P(Keys, SemanticErrorTest, ::testing::ValuesIn(Keys));
 INSTANTIATE_TEST_SUITE_P(Qualifiers, SemanticErrorTest, ::testing::ValuesIn(Qualifiers));
 
-} // namespace
+} // namespace SemanticErrorTests

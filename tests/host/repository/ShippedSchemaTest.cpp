@@ -9,7 +9,7 @@
 
 #include <cmpidt.h>
 
-namespace {
+namespace ShippedSchemaTests {
 
 using ::testing::ElementsAre;
 
@@ -169,4 +169,4 @@ TEST_F(ShippedSchemaTest, mappedPropertiesExist)
             }
 }
 
-} // namespace
+} // namespace ShippedSchemaTests

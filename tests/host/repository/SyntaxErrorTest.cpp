@@ -4,7 +4,7 @@
 
 #include "tests/host/repository/MofTest.h"
 
-namespace {
+namespace SyntaxErrorTests {
 
 using Testing::errorOf;
 
@@ -155,4 +155,4 @@ INSTANTIATE_TEST_SUITE_P(Classes, SyntaxErrorTest, ::testing::ValuesIn(Classes))
 INSTANTIATE_TEST_SUITE_P(Qualifiers, SyntaxErrorTest, ::testing::ValuesIn(Qualifiers));
 INSTANTIATE_TEST_SUITE_P(Values, SyntaxErrorTest, ::testing::ValuesIn(Values));
 
-} // namespace
+} // namespace SyntaxErrorTests

@@ -13,7 +13,7 @@
 #include <chrono>
 #include <thread>
 
-namespace {
+namespace HwmonChangeTests {
 
 using Testing::Attributes;
 using Testing::BoundSysfs;
@@ -181,4 +181,4 @@ TEST_F(HwmonChange, eightThreadsReadWhileChipsComeAndGo)
     EXPECT_THAT(walk(), SizeIs(3));
 }
 
-} // namespace
+} // namespace HwmonChangeTests

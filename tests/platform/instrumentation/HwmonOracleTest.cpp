@@ -10,7 +10,7 @@
 #include <array>
 #include <cstdio>
 
-namespace {
+namespace HwmonOracleTests {
 
 using Json = nlohmann::json;
 using Testing::BoundSysfs;
@@ -148,4 +148,4 @@ TEST_P(Oracle, agreesUnderAConfigurationOfTheAdministrator)
 INSTANTIATE_TEST_SUITE_P(Trees, Oracle, testing::Values("desktop", "server", "hotplug"),
     [](const auto& tree) { return std::string(tree.param); });
 
-} // namespace
+} // namespace HwmonOracleTests

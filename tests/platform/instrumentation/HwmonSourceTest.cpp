@@ -12,7 +12,7 @@
 
 #include <new>
 
-namespace {
+namespace HwmonSourceTests {
 
 using Testing::Attributes;
 using Testing::BoundSysfs;
@@ -255,4 +255,4 @@ TEST_F(Hwmon, aFatalErrorOfLibsensorsIsALackOfMemoryAndNotTheEndOfTheProcess)
     EXPECT_THROW(sensors_fatal_error("sensors_malloc", "Out of memory"), std::bad_alloc);
 }
 
-} // namespace
+} // namespace HwmonSourceTests

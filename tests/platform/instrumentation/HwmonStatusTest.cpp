@@ -6,7 +6,7 @@
 
 #include <gmock/gmock.h>
 
-namespace {
+namespace HwmonStatusTests {
 
 using Testing::Attributes;
 using testing::ElementsAre;
@@ -112,4 +112,4 @@ TEST_F(Hwmon, aChannelWithAFaultShowsItsLimitsButNoReading)
     EXPECT_EQ(values.upperNonCritical, 80.0);
 }
 
-} // namespace
+} // namespace HwmonStatusTests

@@ -6,7 +6,7 @@
 
 #include <gtest/gtest.h>
 
-namespace {
+namespace HwmonTreesTests {
 
 using Testing::BoundSysfs;
 using Testing::HwmonTest;
@@ -60,4 +60,4 @@ TEST_F(HwmonTrees, aServerShowsWhatIsHotFailedDisabledAndLost)
                                       }));
 }
 
-} // namespace
+} // namespace HwmonTreesTests

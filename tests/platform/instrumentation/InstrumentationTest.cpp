@@ -12,7 +12,7 @@
 
 #include <thread>
 
-namespace {
+namespace InstrumentationTests {
 
 using testing::ElementsAre;
 using Testing::EnvironmentVariable;
@@ -338,4 +338,4 @@ TEST_F(Failure, ofASettingIsReportedOnce)
     EXPECT_THAT(textsOf(capture), SizeIs(1));
 }
 
-} // namespace
+} // namespace InstrumentationTests

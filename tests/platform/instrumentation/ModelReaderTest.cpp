@@ -14,7 +14,7 @@
 #include <stdexcept>
 #include <tuple>
 
-namespace {
+namespace ModelReaderTests {
 
 using namespace std::string_literals;
 using testing::ElementsAre;
@@ -293,4 +293,4 @@ TEST(HostileModel, controlCharactersAreEscapedInTheMessage)
         "/nodes/0/a\\x0ab: there is no such member");
 }
 
-} // namespace
+} // namespace ModelReaderTests

@@ -21,7 +21,7 @@
 #include <sys/wait.h>
 #include <unistd.h>
 
-namespace {
+namespace ModelSourceTests {
 
 using testing::ElementsAre;
 using Testing::EnvironmentVariable;
@@ -290,4 +290,4 @@ TEST_F(ModelFileTest, recordedHasOneLineForEveryNode)
     EXPECT_EQ(Vorn::recordModel(), "{ \"nodes\": [\n] }\n");
 }
 
-} // namespace
+} // namespace ModelSourceTests

@@ -10,7 +10,7 @@
 
 #include <limits>
 
-namespace {
+namespace RecorderTests {
 
 using Testing::ScriptedMachine;
 using testing::SizeIs;
@@ -66,4 +66,4 @@ TEST(Recorder, passesOnTheErrorOfASource)
     EXPECT_EQ(Testing::errorOf([] { recordModel(); }), "scripted: construction");
 }
 
-} // namespace
+} // namespace RecorderTests

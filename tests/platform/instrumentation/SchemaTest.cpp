@@ -15,7 +15,7 @@
 #include <map>
 #include <set>
 
-namespace {
+namespace SchemaTests {
 
 using Testing::SeenNode;
 using testing::UnorderedElementsAreArray;
@@ -101,4 +101,4 @@ TEST(DemoModel, showsSensorsOfEveryKindInEveryStateThatMatters)
     EXPECT_THAT(statuses, testing::ElementsAre(1, 13, 16, 22, 23, 25, 26));
 }
 
-} // namespace
+} // namespace SchemaTests

@@ -7,7 +7,7 @@
 
 #include <gmock/gmock.h>
 
-namespace {
+namespace SourceListTests {
 
 using Testing::errorOf;
 using testing::HasSubstr;
@@ -56,4 +56,4 @@ TEST(SourceList, namesAnEntryThatEndsInALoneBackslash)
     EXPECT_THAT(errorOf([] { parseSourceList("model:x\\"); }), HasSubstr("\"model:x\\\""));
 }
 
-} // namespace
+} // namespace SourceListTests

@@ -7,7 +7,7 @@
 #include <limits>
 #include <string>
 
-namespace {
+namespace StatusTests {
 
 using Vorn::Hwmon::Alarms;
 using Vorn::Hwmon::Channel;
@@ -153,4 +153,4 @@ TEST(PossibleStates, aSwitchAddsDisabledAndAllStatesAscend)
         (std::vector<unsigned>{1, 16, 21, 22, 23, 25, 26}));
 }
 
-} // namespace
+} // namespace StatusTests

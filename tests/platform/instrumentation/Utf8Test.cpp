@@ -4,7 +4,7 @@
 
 #include <gtest/gtest.h>
 
-namespace {
+namespace Utf8Tests {
 
 using namespace std::string_literals;
 using Vorn::escapeControls;
@@ -50,4 +50,4 @@ TEST(EscapeControls, writesControlCharactersInHexadecimal)
     EXPECT_EQ(escapeControls("a\n\x7F\0z \u00B0"s), "a\\x0a\\x7f\\x00z \u00B0");
 }
 
-} // namespace
+} // namespace Utf8Tests

@@ -5,7 +5,7 @@
 
 #include <gtest/gtest.h>
 
-namespace {
+namespace FormatTextTests {
 
 using Vorn::formatText;
 using Vorn::hasOneInsert;
@@ -84,4 +84,4 @@ TEST(TextFormat, AllowsNoOtherConversion)
         EXPECT_FALSE(hasOneInsert(bad)) << testing::PrintToString(std::wstring(bad));
 }
 
-} // namespace
+} // namespace FormatTextTests

@@ -6,7 +6,7 @@
 
 #include <gtest/gtest.h>
 
-namespace {
+namespace LocaleTests {
 
 using Testing::EnvironmentVariable;
 using Vorn::CatalogName;
@@ -92,4 +92,4 @@ TEST(CatalogName, CannotLeadOutOfTheFolder)
         EXPECT_FALSE(CatalogName::split(name)) << testing::PrintToString(name);
 }
 
-} // namespace
+} // namespace LocaleTests

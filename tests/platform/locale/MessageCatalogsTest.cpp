@@ -14,7 +14,7 @@
 #include <thread>
 #include <vector>
 
-namespace {
+namespace MessageCatalogsTests {
 
 using Testing::CatalogRoot;
 using Testing::messageFile;
@@ -203,4 +203,4 @@ TEST(MessageFile, TooLargeOrNoFileAtAllIsEmpty)
     EXPECT_TRUE(Vorn::readMessageFile(folder.write("large", text)).empty());
 }
 
-} // namespace
+} // namespace MessageCatalogsTests

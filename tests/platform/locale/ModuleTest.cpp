@@ -13,7 +13,7 @@
 #include <stdexcept>
 #include <string>
 
-namespace {
+namespace ModuleTests {
 
 namespace fs = std::filesystem;
 
@@ -88,4 +88,4 @@ TEST_P(InstalledLibrary, SpeaksEnglishWithoutCatalogs)
 INSTANTIATE_TEST_SUITE_P(Layouts, InstalledLibrary,
     testing::Values("lib", "bin", "lib/cmpi", "lib64/cmpi", "lib/x86_64-linux-gnu/cmpi"));
 
-} // namespace
+} // namespace ModuleTests

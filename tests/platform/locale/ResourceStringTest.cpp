@@ -14,7 +14,7 @@
 #include <clocale>
 #include <locale>
 
-namespace {
+namespace ResourceStringTests {
 
 using Testing::EnvironmentVariable;
 using Vorn::Locale;
@@ -96,4 +96,4 @@ TEST(ResourceString, TheProcessKeepsItsLocale)
     EXPECT_EQ(std::locale().name(), "C");
 }
 
-} // namespace
+} // namespace ResourceStringTests

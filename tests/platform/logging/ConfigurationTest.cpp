@@ -7,7 +7,7 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
-namespace {
+namespace ConfigurationTests {
 
 using RynLog::configurationFromEnvironment;
 using testing::AllOf;
@@ -93,4 +93,4 @@ TEST(Configuration, ASinkThatMakesNoSenseChangesNothing)
     EXPECT_THAT(file.lines(), SizeIs(1));
 }
 
-} // namespace
+} // namespace ConfigurationTests

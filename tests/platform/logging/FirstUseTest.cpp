@@ -11,7 +11,7 @@
 #include <cstdio>
 #include <cstdlib>
 
-namespace {
+namespace FirstUseTests {
 
 using Testing::logLine;
 using Testing::traceLine;
@@ -96,4 +96,4 @@ TEST_F(FirstUse, ALineAfterTheEndOfTheChannelsIsLostQuietly)
         testing::ExitedWithCode(0), "^[^\n]+ before the end\n$");
 }
 
-} // namespace
+} // namespace FirstUseTests

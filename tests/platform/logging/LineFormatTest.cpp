@@ -4,7 +4,7 @@
 
 #include <gtest/gtest.h>
 
-namespace {
+namespace LineFormatTests {
 
 using namespace std::string_literals;
 using RynLog::formatLine;
@@ -71,4 +71,4 @@ TEST(Escaping, KeepsUtf8)
     EXPECT_EQ(escaped("Lüfter ファン 1"), "Lüfter ファン 1");
 }
 
-} // namespace
+} // namespace LineFormatTests

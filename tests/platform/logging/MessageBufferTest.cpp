@@ -8,7 +8,7 @@
 #include <limits>
 #include <locale>
 
-namespace {
+namespace MessageBufferTests {
 
 using RynLog::RynMessageBuffer;
 
@@ -129,4 +129,4 @@ TEST(MessageBuffer, TheGlobalLocaleChangesNothing)
     EXPECT_EQ(fraction, "1234.5");
 }
 
-} // namespace
+} // namespace MessageBufferTests

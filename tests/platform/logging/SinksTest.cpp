@@ -14,7 +14,7 @@
 #include <limits>
 #include <regex>
 
-namespace {
+namespace SinksTests {
 
 using RynLog::RynLogger;
 using testing::ElementsAre;
@@ -223,4 +223,4 @@ TEST(Level, AnyLevelIsPossible)
     EXPECT_THAT(file.lines(), SizeIs(1));
 }
 
-} // namespace
+} // namespace SinksTests

@@ -6,7 +6,7 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
-namespace {
+namespace SyslogTests {
 
 using testing::AllOf;
 using testing::HasSubstr;
@@ -88,4 +88,4 @@ TEST_F(SyslogSink, TheOtherChannelGoesOnWhenAFileCannotBeOpened)
     EXPECT_EQ(file.lines().size(), 1U);
 }
 
-} // namespace
+} // namespace SyslogTests

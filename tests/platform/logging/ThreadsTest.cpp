@@ -8,7 +8,7 @@
 #include <set>
 #include <thread>
 
-namespace {
+namespace ThreadsTests {
 
 using Testing::LogFile;
 using Testing::logLine;
@@ -64,4 +64,4 @@ TEST(Threads, WriteOnWhileTheConfigurationChanges)
         static_cast<std::size_t>(writers * linesPerWriter));
 }
 
-} // namespace
+} // namespace ThreadsTests

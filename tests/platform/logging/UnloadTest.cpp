@@ -9,7 +9,7 @@
 #include <fstream>
 #include <memory>
 
-namespace {
+namespace UnloadTests {
 
 using Testing::LogFile;
 
@@ -52,4 +52,4 @@ TEST(Unload, ALibraryThatLoggedLeavesNoDescriptorAndNoMapping)
     EXPECT_EQ(file.lines().size(), rounds);
 }
 
-} // namespace
+} // namespace UnloadTests
