@@ -2,9 +2,12 @@
 
 #include "host/operations/Selections.h"
 
+#include "host/broker/Names.h"
 #include "host/repository/Repository.h"
 
 #include <algorithm>
+#include <set>
+#include <string_view>
 
 namespace Host {
 
@@ -26,15 +29,34 @@ bool leavesOutSubclasses(const Operation& operation)
            !operation.deepInheritance;
 }
 
-// As the first class has it that has such a property: not every provider knows a name that is
-// spelled otherwise. What no class has stays as it is, and selects nothing.
-void spellAsDeclared(const Namespace& nameSpace, std::string& name)
+struct NameOrder {
+    bool operator()(std::string_view a, std::string_view b) const
+    {
+        return std::lexicographical_compare(a.begin(), a.end(), b.begin(), b.end(),
+            [](char x, char y) { return foldCase(x) < foldCase(y); });
+    }
+};
+
+// As the first class has each that has such a property: not every provider knows a name that is
+// spelled otherwise. What no class has selects nothing and is left out, and what comes twice is
+// there once: a client's list may be as long as a request, and each instance is held against it.
+std::vector<std::string> spelledAsDeclared(
+    const Namespace& nameSpace, const std::vector<std::string>& names)
 {
-    for (const auto& declared : nameSpace.classes())
-        if (const PropertyDeclaration* const property = declared->property(name)) {
-            name = property->name;
-            return;
-        }
+    std::set<std::string_view, NameOrder> wanted(names.begin(), names.end());
+    std::vector<std::string> spelled;
+    for (const auto& declared : nameSpace.classes()) {
+        if (wanted.empty())
+            break;
+        for (const auto& property : declared->properties)
+            // Inherited ones were seen already: classes come after those above them.
+            if (property->declaredIn == declared.get() && wanted.erase(property->name) != 0)
+                spelled.push_back(property->name);
+    }
+    // A provider that takes an empty list for none must not send everything.
+    if (spelled.empty() && !names.empty())
+        spelled.push_back(names.front());
+    return spelled;
 }
 
 // The properties of the class that are selected.
@@ -55,8 +77,8 @@ PropertySelection effectiveSelection(const Operation& operation, const Repositor
     if (!isOfClasses(operation.kind))
         selection.localOnly = false;
     if (selection.properties)
-        for (std::string& name : *selection.properties)
-            spellAsDeclared(*classes.findNamespace(operation.nameSpace), name);
+        selection.properties =
+            spelledAsDeclared(*classes.findNamespace(operation.nameSpace), *selection.properties);
     if (leavesOutSubclasses(operation)) {
         const auto* const declared = classes.findClass(operation.nameSpace, operation.className);
         // Without subclasses there is nothing to leave out.

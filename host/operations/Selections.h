@@ -16,7 +16,8 @@ namespace Host {
 
 class Repository;
 
-// The operation's own, its properties spelled as they are declared, with two differences for
+// The operation's own, its properties spelled as they are declared, each once, without those that
+// no class of the namespace has; were all of them such, one stays. There are two differences for
 // operations on instances. LocalOnly is put aside, as the standard recommends: a client that
 // leaves the flag to its default would get next to nothing of an object whose class inherits
 // much. And where DeepInheritance is false, the list is no longer than the named class.

@@ -107,17 +107,18 @@ TEST_F(DispatcherTest, flagsAreThoseOfTheOperationWithoutLocalOnly)
             0U));
 }
 
-TEST_F(DispatcherTest, propertyListsArriveSpelledAsDeclared)
+TEST_F(DispatcherTest, propertyListsArriveSpelledAsDeclaredAndWithoutWhatSaysNothing)
 {
     std::vector<std::vector<std::string>> seen;
     onThings([&seen](const ProviderCall& asked) { seen.push_back(listed(asked.properties)); });
     const std::string name = parameter("InstanceName", thing());
     ask("GetInstance", name);
     ask("GetInstance", name + list({}));
-    ask("GetInstance", name + list({"label", "Unheard"}));
+    ask("GetInstance", name + list({"label", "Unheard", "LABEL", "unheard"}));
+    ask("GetInstance", name + list({"Unheard", "Unseen"}));
     ask("GetProperty", name + valueOf("PropertyName", "ISON"));
-    EXPECT_THAT(seen, ElementsAre(ElementsAre("all"), ElementsAre(),
-                          ElementsAre("Label", "Unheard"), ElementsAre("IsOn")));
+    EXPECT_THAT(seen, ElementsAre(ElementsAre("all"), ElementsAre(), ElementsAre("Label"),
+                          ElementsAre("Unheard"), ElementsAre("IsOn")));
 }
 
 TEST_F(DispatcherTest, withoutDeepInheritanceTheListEndsWithTheClass)
