@@ -171,6 +171,18 @@ protected:
         EXPECT_EQ(answer_.isDone(), isDone);
     }
 
+    // Nothing but paths of associations, each with this machine's name and both its references.
+    void expectAssociationPaths(const std::string& association, const std::string& nameSpace)
+    {
+        EXPECT_TRUE(answer_.instances().empty());
+        for (const Host::ObjectPath* const each : answer_.paths()) {
+            EXPECT_EQ(each->className(), association);
+            EXPECT_EQ(each->nameSpace(), nameSpace);
+            EXPECT_EQ(each->host(), systemName_);
+            EXPECT_EQ(each->keys().size(), 2U);
+        }
+    }
+
     // The value that tells the object from its like: a sensor's, a system's or a capabilities'.
     static std::string nameOf(const Host::ObjectPath& end)
     {

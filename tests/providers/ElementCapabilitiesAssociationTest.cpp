@@ -259,13 +259,7 @@ TEST_F(ElementCapabilitiesAssociationTest, namesOfReferencesAreThePathsOfTheSame
     expectOk(referenceNames(capabilities("root/other")));
     expectOk(referenceNames(sensor("D:/4", "root/other")));
     EXPECT_THAT(pairs(), ElementsAre("A:/1 " + Cap, "B:/2 " + Cap, "C:/3 " + Cap, "D:/4 " + Cap));
-    EXPECT_TRUE(answer_.instances().empty());
-    for (const Host::ObjectPath* const each : answer_.paths()) {
-        EXPECT_EQ(each->className(), Class);
-        EXPECT_EQ(each->nameSpace(), "root/other");
-        EXPECT_EQ(each->host(), systemName_);
-        EXPECT_EQ(each->keys().size(), 2U);
-    }
+    expectAssociationPaths(Class, "root/other");
     EXPECT_FALSE(answer_.isDone());
 }
 

@@ -56,14 +56,8 @@ protected:
         const std::string& traceText, const std::string& messageText)
     {
         for (const RequestKind& kind : {Instances, OneInstance}) {
-            std::unique_ptr<FaultyRequest> request;
-            const Lines lines = ownLines(traceOf([&] { request = run(kind, fault); }));
-            EXPECT_EQ(request->status.rc, CMPI_RC_OK);
-            EXPECT_EQ(request->status.msg, nullptr);
-            EXPECT_THAT(request->answer.instances(), IsEmpty());
-            EXPECT_TRUE(request->answer.isDone());
-            EXPECT_EQ(request->lastString(), statusText);
-            EXPECT_EQ(request->lastMessage(), (BrokerMessage{2, Provider, traceText}));
+            const auto [request, lines] = runTraced(kind, fault);
+            expectEmptyAnswer(*request, statusText, {2, Provider, traceText});
             const HandlerLines builder = handler("sensorElementCapabilitiesCMPIInstances");
             const HandlerLines outer =
                 handler(kind.name == "instances" ? "SensorElementCapabilities_EnumInstances"
@@ -77,11 +71,8 @@ protected:
     void expectNamesFailure(
         const Fault& fault, const std::string& statusText, const std::string& traceText)
     {
-        std::unique_ptr<FaultyRequest> request;
-        const Lines lines = ownLines(traceOf([&] { request = run(Names, fault); }));
-        EXPECT_EQ(request->status.rc, CMPI_RC_ERR_FAILED);
-        EXPECT_EQ(request->message(), statusText);
-        EXPECT_FALSE(request->answer.isDone());
+        const auto [request, lines] = runTraced(Names, fault);
+        expectBrokenOff(*request, statusText);
         EXPECT_THAT(request->messages, ElementsAre(BrokerMessage{2, Provider, traceText}));
         const HandlerLines names = handler("SensorElementCapabilities_EnumInstanceNames");
         EXPECT_THAT(lines,
@@ -125,13 +116,9 @@ constexpr unsigned KeyOfFirstCapabilities = 9;
 TEST_F(ElementCapabilitiesFaultTest, namesWithoutSensorPathsEndInTheFactorysStatus)
 {
     for (const FaultManner manner : Undelivered) {
-        std::unique_ptr<FaultyRequest> request;
-        const Lines lines = ownLines(traceOf([&] {
-            request = run(Names, {BrokerCall::newObjectPath, FirstSensor, manner});
-        }));
-        EXPECT_EQ(request->status.rc, CMPI_RC_ERR_FAILED);
-        EXPECT_EQ(request->message(), "Create CMPIObjectPath failed.");
-        EXPECT_FALSE(request->answer.isDone());
+        const auto [request, lines] =
+            runTraced(Names, {BrokerCall::newObjectPath, FirstSensor, manner});
+        expectBrokenOff(*request, "Create CMPIObjectPath failed.");
         EXPECT_EQ(request->messages.size(), 1U); // the factory's
         EXPECT_EQ(lines, handler("SensorElementCapabilities_EnumInstanceNames").entry());
     }
@@ -140,13 +127,9 @@ TEST_F(ElementCapabilitiesFaultTest, namesWithoutSensorPathsEndInTheFactorysStat
 TEST_F(ElementCapabilitiesFaultTest, namesWithoutCapabilitiesPathsEndInTheFactorysStatus)
 {
     for (const FaultManner manner : Undelivered) {
-        std::unique_ptr<FaultyRequest> request;
-        const Lines lines = ownLines(traceOf([&] {
-            request = run(Names, {BrokerCall::newObjectPath, FirstCapabilities, manner});
-        }));
-        EXPECT_EQ(request->status.rc, CMPI_RC_ERR_FAILED);
-        EXPECT_EQ(request->message(), "Create CMPIObjectPath failed");
-        EXPECT_FALSE(request->answer.isDone());
+        const auto [request, lines] =
+            runTraced(Names, {BrokerCall::newObjectPath, FirstCapabilities, manner});
+        expectBrokenOff(*request, "Create CMPIObjectPath failed");
         EXPECT_EQ(lines, handler("SensorElementCapabilities_EnumInstanceNames").entry());
     }
 }
@@ -265,10 +248,8 @@ TEST_F(ElementCapabilitiesFaultTest, aTargetThatCannotBeMadeIsNoTarget)
                 const auto request =
                     run(kinds[which], {BrokerCall::newObjectPath, 1, manner, CMPI_RC_OK});
                 const std::string text = "Object Path is NULL in " + names[which] + ".";
-                EXPECT_EQ(request->status.rc, CMPI_RC_ERR_FAILED);
-                EXPECT_EQ(request->message(), text);
+                expectBrokenOff(*request, text);
                 EXPECT_EQ(request->lastMessage(), (BrokerMessage{2, Provider, text}));
-                EXPECT_FALSE(request->answer.isDone());
             }
 }
 
@@ -279,12 +260,10 @@ TEST_F(ElementCapabilitiesFaultTest, farEndsThatCannotBeMadeEndInTheFactorysStat
         "SensorElementCapabilities_References", "SensorElementCapabilities_ReferenceNames"};
     for (const Which which : {AssociatorNames, References, ReferenceNames})
         for (const bool fromSensor : {true, false}) {
-            std::unique_ptr<FaultyRequest> request;
-            const Lines lines = ownLines(traceOf([&] {
-                request = run((fromSensor ? FromSensor : FromCapabilities)[which],
+            const auto [request, lines] =
+                runTraced((fromSensor ? FromSensor : FromCapabilities)[which],
                     {BrokerCall::newObjectPath, which == AssociatorNames ? 2U : 3U,
                         FaultManner::nullResult});
-            }));
             EXPECT_EQ(request->status.rc, CMPI_RC_ERR_FAILED);
             EXPECT_EQ(request->message(),
                 fromSensor ? "Create CMPIObjectPath failed" : "Create CMPIObjectPath failed.");

@@ -7,6 +7,7 @@
 #include "tests/providers/ComputerSystems.h"
 #include "tests/providers/FaultyRequest.h"
 #include "tests/providers/ProfileClasses.h"
+#include "tests/providers/RequestTrace.h"
 
 #include <algorithm>
 #include <string>
@@ -174,6 +175,39 @@ protected:
     {
         broker_.setClassInformation(&profileClasses());
         broker_.setUpcalls(&systems_);
+    }
+
+    struct TracedRequest {
+        std::unique_ptr<FaultyRequest> request;
+        Lines lines; // the provider's own
+    };
+    TracedRequest runTraced(const RequestKind& kind, const Fault& fault)
+    {
+        TracedRequest traced;
+        traced.lines = ownLines(traceOf([&] { traced.request = run(kind, fault); }));
+        return traced;
+    }
+
+    // A status of its own, and an answer that is not ended.
+    static void expectBrokenOff(const FaultyRequest& request, const std::string& statusText)
+    {
+        EXPECT_EQ(request.status.rc, CMPI_RC_ERR_FAILED);
+        EXPECT_EQ(request.message(), statusText);
+        EXPECT_FALSE(request.answer.isDone());
+    }
+
+    // An answer as if nothing had been there; the failure is told in a string and a message only.
+    static void expectEmptyAnswer(
+        const FaultyRequest& request, const std::string& lastString, const BrokerMessage& message)
+    {
+        EXPECT_EQ(request.status.rc, CMPI_RC_OK);
+        EXPECT_EQ(request.status.msg, nullptr);
+        EXPECT_TRUE(request.answer.paths().empty());
+        EXPECT_TRUE(request.answer.instances().empty());
+        EXPECT_EQ(request.answer.refused(), 0U);
+        EXPECT_TRUE(request.answer.isDone());
+        EXPECT_EQ(request.lastString(), lastString);
+        EXPECT_EQ(request.lastMessage(), message);
     }
 
     ComputerSystems systems_;

@@ -87,9 +87,8 @@ TEST_F(SystemDeviceAssociationFaultTest, sensorPathsThatCannotBeMadeEndInTheFact
 {
     for (const Which which : {AssociatorNames, References, ReferenceNames}) {
         const unsigned nth = which == AssociatorNames ? 2 : 3;
-        std::unique_ptr<FaultyRequest> request;
         const Fault fault = {BrokerCall::newObjectPath, nth, FaultManner::nullResult};
-        const Lines lines = ownLines(traceOf([&] { request = run(FromSystem[which], fault); }));
+        const auto [request, lines] = runTraced(FromSystem[which], fault);
         EXPECT_EQ(request->status.rc, CMPI_RC_ERR_FAILED);
         EXPECT_EQ(request->message(), "Create CMPIObjectPath failed.");
         EXPECT_EQ(countOf(*request), 0U);
@@ -137,9 +136,8 @@ TEST_F(SystemDeviceAssociationFaultTest, aBreakBetweenFarEndsLeavesNoReferences)
 {
     for (const Which which : {References, ReferenceNames})
         for (const BrokerCall call : {BrokerCall::hasNext, BrokerCall::getNext}) {
-            std::unique_ptr<FaultyRequest> request;
             const Fault fault = {call, 2, FaultManner::errorStatus};
-            const Lines lines = ownLines(traceOf([&] { request = run(FromSensor[which], fault); }));
+            const auto [request, lines] = runTraced(FromSensor[which], fault);
             EXPECT_EQ(request->status.rc, CMPI_RC_ERR_FAILED);
             EXPECT_EQ(countOf(*request), 0U);
             const HandlerLines expected = handler(Requests[which]);

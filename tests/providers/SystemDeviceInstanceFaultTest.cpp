@@ -24,14 +24,8 @@ protected:
         const std::string& traceText, bool hasExitMark)
     {
         for (const RequestKind& kind : {Instances, OneInstance}) {
-            std::unique_ptr<FaultyRequest> request;
-            const Lines lines = ownLines(traceOf([&] { request = run(kind, fault); }));
-            EXPECT_EQ(request->status.rc, CMPI_RC_OK);
-            EXPECT_EQ(request->status.msg, nullptr);
-            EXPECT_EQ(countOf(*request), 0U);
-            EXPECT_TRUE(request->answer.isDone());
-            EXPECT_EQ(request->lastString(), statusText);
-            EXPECT_EQ(request->lastMessage(), (BrokerMessage{2, Provider, traceText}));
+            const auto [request, lines] = runTraced(kind, fault);
+            expectEmptyAnswer(*request, statusText, {2, Provider, traceText});
             const HandlerLines builder = {
                 "SenosrSystemDeviceProvider", Provider, "sensorSystemDeviceCMPIInstances"};
             const HandlerLines outer =
@@ -45,16 +39,13 @@ protected:
     std::unique_ptr<FaultyRequest> expectNamesFailure(const Fault& fault,
         const std::string& statusText, const std::string& traceText, bool hasExitMark)
     {
-        std::unique_ptr<FaultyRequest> request;
-        const Lines lines = ownLines(traceOf([&] { request = run(Names, fault); }));
-        EXPECT_EQ(request->status.rc, CMPI_RC_ERR_FAILED);
-        EXPECT_EQ(request->message(), statusText);
-        EXPECT_FALSE(request->answer.isDone());
+        auto [request, lines] = runTraced(Names, fault);
+        expectBrokenOff(*request, statusText);
         EXPECT_THAT(request->messages, ElementsAre(BrokerMessage{2, Provider, traceText}));
         const HandlerLines names = handler("EnumInstanceNames");
         EXPECT_THAT(lines,
             ElementsAreArray(sequence({names.entry(), hasExitMark ? names.exit() : Lines()})));
-        return request;
+        return std::move(request);
     }
 };
 
@@ -96,14 +87,10 @@ TEST_F(SystemDeviceInstanceFaultTest, namesEndAtAnAssociationPathThatCannotBeMad
 TEST_F(SystemDeviceInstanceFaultTest, namesWithoutSensorPathsEndInTheFactorysStatus)
 {
     for (const FaultManner manner : Undelivered) {
-        std::unique_ptr<FaultyRequest> request;
-        const Lines lines = ownLines(traceOf([&] {
-            request = run(Names, {BrokerCall::newObjectPath, FirstSensor, manner});
-        }));
-        EXPECT_EQ(request->status.rc, CMPI_RC_ERR_FAILED);
-        EXPECT_EQ(request->message(), "Create CMPIObjectPath failed.");
+        const auto [request, lines] =
+            runTraced(Names, {BrokerCall::newObjectPath, FirstSensor, manner});
+        expectBrokenOff(*request, "Create CMPIObjectPath failed.");
         EXPECT_EQ(request->messages.size(), 1U); // the factory's
-        EXPECT_FALSE(request->answer.isDone());
         EXPECT_EQ(lines, handler("EnumInstanceNames").entry());
     }
 }
@@ -138,9 +125,8 @@ TEST_F(SystemDeviceInstanceFaultTest, namesEndWhereTheEnumerationBreaks)
 {
     for (const BrokerCall call : {BrokerCall::hasNext, BrokerCall::getNext})
         for (const FaultManner manner : {FaultManner::nullResult, FaultManner::errorStatus}) {
-            std::unique_ptr<FaultyRequest> request;
             const Fault fault = {call, 2, manner, CMPI_RC_ERR_FAILED};
-            const Lines lines = ownLines(traceOf([&] { request = run(Names, fault); }));
+            const auto [request, lines] = runTraced(Names, fault);
             EXPECT_EQ(request->status.rc, CMPI_RC_ERR_FAILED); // as the broker left it
             EXPECT_EQ(countOf(*request), 2U);                  // of the first system
             EXPECT_FALSE(request->answer.isDone());
@@ -180,8 +166,7 @@ TEST_F(SystemDeviceInstanceFaultTest, theBuilderEndsSilentlyAtAnUpcallAnElementO
             Fault{BrokerCall::hasNext, 2, FaultManner::errorStatus},
             Fault{BrokerCall::getNext, 2, FaultManner::errorStatus},
             Fault{BrokerCall::newObjectPath, FirstSensor, FaultManner::nullResult}}) {
-        std::unique_ptr<FaultyRequest> request;
-        const Lines lines = ownLines(traceOf([&] { request = run(Instances, fault); }));
+        const auto [request, lines] = runTraced(Instances, fault);
         EXPECT_EQ(request->status.rc, CMPI_RC_OK);
         EXPECT_EQ(countOf(*request), 0U);
         EXPECT_TRUE(request->answer.isDone());

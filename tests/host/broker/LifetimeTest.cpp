@@ -6,41 +6,13 @@
 #include "host/broker/Instance.h"
 #include "host/broker/Result.h"
 #include "tests/host/broker/BrokerTest.h"
+#include "tests/support/CountingMemory.h"
 
 #include <array>
-#include <memory_resource>
 
 namespace HostTests {
 
 namespace {
-
-// Counts what is taken from the heap and not given back. In force while it lives.
-class CountingMemory : public std::pmr::memory_resource {
-public:
-    CountingMemory() : before_(std::pmr::set_default_resource(this)) {}
-    ~CountingMemory() override { std::pmr::set_default_resource(before_); }
-
-    std::size_t taken() const { return taken_; }
-
-private:
-    void* do_allocate(std::size_t size, std::size_t alignment) override
-    {
-        taken_ += size;
-        return before_->allocate(size, alignment);
-    }
-    void do_deallocate(void* block, std::size_t size, std::size_t alignment) override
-    {
-        taken_ -= size;
-        before_->deallocate(block, size, alignment);
-    }
-    bool do_is_equal(const memory_resource& other) const noexcept override
-    {
-        return this == &other;
-    }
-
-    std::pmr::memory_resource* before_;
-    std::size_t taken_ = 0;
-};
 
 class LifetimeTest : public testing::Test {
 protected:
@@ -51,7 +23,7 @@ protected:
         return made;
     }
 
-    CountingMemory memory;
+    Testing::CountingMemory memory;
     Host::Broker broker;
     const CMPIBroker* mb = broker.handle();
     CMPIStatus rc{CMPI_RC_OK, nullptr};

@@ -3,8 +3,7 @@
 // Enumerations that are opened, pulled and closed by messages.
 
 #include "tests/host/operations/ScriptedManager.h"
-
-#include <memory_resource>
+#include "tests/support/CountingMemory.h"
 
 namespace OperationTests {
 
@@ -14,34 +13,6 @@ using namespace std::chrono_literals;
 using testing::StartsWith;
 
 constexpr std::string_view InstanceElement = "<VALUE.INSTANCEWITHPATH>";
-
-// What arenas take while it lives.
-class CountedMemory : public std::pmr::memory_resource {
-public:
-    CountedMemory() : before_(std::pmr::set_default_resource(this)) {}
-    ~CountedMemory() override { std::pmr::set_default_resource(before_); }
-
-    std::size_t taken() const { return taken_; }
-
-private:
-    void* do_allocate(std::size_t size, std::size_t alignment) override
-    {
-        taken_ += size;
-        return before_->allocate(size, alignment);
-    }
-    void do_deallocate(void* block, std::size_t size, std::size_t alignment) override
-    {
-        taken_ -= size;
-        before_->deallocate(block, size, alignment);
-    }
-    bool do_is_equal(const memory_resource& other) const noexcept override
-    {
-        return this == &other;
-    }
-
-    std::pmr::memory_resource* before_;
-    std::size_t taken_ = 0;
-};
 
 class PullTest : public testing::Test {
 protected:
@@ -66,7 +37,7 @@ protected:
             caller);
     }
 
-    CountedMemory memory_;
+    Testing::CountingMemory memory_;
     ScriptedManager manager_{
         {.maximumOpenEnumerations = 2, .maximumHeldObjects = 12, .maximumObjectCount = 3}};
 };

@@ -2,13 +2,13 @@
 
 // Texts in a library that is loaded and unloaded, wherever it is installed.
 
+#include "tests/support/Mappings.h"
 #include "tests/support/TemporaryFolder.h"
 
 #include <gtest/gtest.h>
 
 #include <dlfcn.h>
 
-#include <fstream>
 #include <memory>
 #include <stdexcept>
 #include <string>
@@ -16,15 +16,7 @@
 namespace ModuleTests {
 
 namespace fs = std::filesystem;
-
-bool isMapped(const std::string& library)
-{
-    std::ifstream maps("/proc/self/maps");
-    for (std::string line; std::getline(maps, line);)
-        if (line.find(library) != std::string::npos)
-            return true;
-    return false;
-}
+using Testing::isMapped;
 
 // Whether the library finds its French catalog.
 bool speaksFrench(const std::string& path)

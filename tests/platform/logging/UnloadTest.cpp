@@ -1,31 +1,23 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
 #include "tests/platform/logging/LogFile.h"
+#include "tests/support/Mappings.h"
 
 #include <gtest/gtest.h>
 
 #include <dlfcn.h>
 
-#include <fstream>
 #include <memory>
 
 namespace UnloadTests {
 
+using Testing::isMapped;
 using Testing::LogFile;
 
 std::size_t openDescriptors()
 {
     const std::filesystem::directory_iterator descriptors("/proc/self/fd");
     return static_cast<std::size_t>(std::distance(begin(descriptors), end(descriptors)));
-}
-
-bool isMapped(const std::string& library)
-{
-    std::ifstream maps("/proc/self/maps");
-    for (std::string line; std::getline(maps, line);)
-        if (line.find(library) != std::string::npos)
-            return true;
-    return false;
 }
 
 void loadLogAndUnload(const std::string& path)
