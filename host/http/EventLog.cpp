@@ -35,4 +35,9 @@ void mention(const Place& place, const std::string& text) noexcept
         writeLine(place, levelOfDetails, text);
 }
 
+std::string logProblem() noexcept
+{
+    return RynLog::RynLogger::logProblem();
+}
+
 } // namespace Host::Http

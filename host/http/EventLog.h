@@ -20,4 +20,7 @@ void report(const Place& place, const std::string& text) noexcept;
 // For those who look for the reason of trouble with one client; as a rule not written.
 void mention(const Place& place, const std::string& text) noexcept;
 
+// Why the log does not take what is said, in words; empty when it took the last line.
+std::string logProblem() noexcept;
+
 } // namespace Host::Http

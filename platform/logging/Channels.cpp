@@ -12,25 +12,24 @@
 #include <stdexcept>
 #include <utility>
 
+#include <syslog.h>
+
 namespace RynLog {
 
 namespace {
 
 constexpr int messageLevel = 6000;
 
-std::unique_ptr<spdlog::logger> makeLogger(const std::string& setting)
+std::unique_ptr<spdlog::logger> makeLogger(const SinkSetting& setting)
 {
-    const auto parsed = parseSinkSetting(setting);
-    if (!parsed)
-        throw std::invalid_argument("no such log sink: " + setting);
-    auto sink = makeSink(*parsed);
+    auto sink = makeSink(setting);
     if (!sink)
         return nullptr;
     // Not registered anywhere: spdlog's registry belongs to the process. Errors are kept from
     // standard error, where spdlog reports them by default.
     auto logger = std::make_unique<spdlog::logger>(std::string(), std::move(sink));
     logger->set_level(spdlog::level::trace);
-    logger->set_error_handler([](const std::string&) {});
+    logger->set_error_handler([](const std::string& reason) { throw std::runtime_error(reason); });
     return logger;
 }
 
@@ -81,9 +80,16 @@ void configureAtFirstUse()
 
 } // namespace
 
-Channel::Channel(std::string name, const std::string& setting)
-    : name_(std::move(name)), logger_(makeLogger(setting))
+Channel::Channel(std::string name, const std::string& setting) : name_(std::move(name))
 {
+    const auto parsed = parseSinkSetting(setting);
+    if (!parsed)
+        throw std::invalid_argument("no such log sink: " + setting);
+    try {
+        logger_ = makeLogger(*parsed);
+    } catch (const std::runtime_error& error) {
+        setProblem(error.what());
+    }
 }
 
 Channel::~Channel() = default;
@@ -93,7 +99,29 @@ void Channel::write(
 {
     const std::string line = formatLine(name_, level, origin, component, text);
     const auto severity = level >= messageLevel ? spdlog::level::warn : spdlog::level::debug;
-    logger_->log(severity, spdlog::string_view_t(line));
+    std::string problem;
+    try {
+        logger_->log(severity, spdlog::string_view_t(line));
+    } catch (const std::runtime_error& error) {
+        problem = error.what();
+    }
+    setProblem(std::move(problem));
+}
+
+std::string Channel::problem() const
+{
+    const std::lock_guard lock(guard_);
+    return problem_;
+}
+
+// Said once: a sink that now takes a line and now does not would fill the system's log.
+void Channel::setProblem(std::string problem) const
+{
+    const std::lock_guard lock(guard_);
+    problem_ = std::move(problem);
+    if (problem_.empty() || std::exchange(isReported_, true))
+        return;
+    ::syslog(LOG_DAEMON | LOG_WARNING, "%s; its lines are lost", problem_.c_str());
 }
 
 Channels::Channels(const Configuration& configuration)

@@ -8,6 +8,7 @@
 #include "platform/logging/LineFormat.h"
 
 #include <memory>
+#include <mutex>
 #include <string>
 #include <string_view>
 
@@ -31,9 +32,17 @@ public:
     void write(
         int level, const Origin& origin, std::string_view component, std::string_view text) const;
 
+    // Why the sink could not be opened, or did not take the last line; empty when all is well.
+    std::string problem() const;
+
 private:
+    void setProblem(std::string problem) const;
+
     std::string name_;
     std::unique_ptr<spdlog::logger> logger_; // null when lines lead nowhere
+    mutable std::mutex guard_;               // of what follows
+    mutable std::string problem_;
+    mutable bool isReported_ = false;
 };
 
 struct Channels {

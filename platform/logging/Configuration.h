@@ -23,7 +23,7 @@ Configuration configurationFromEnvironment();
 // under way on other threads are finished with the one they began with. A `problem` becomes the
 // first line of the log channel. A file is created when missing and always appended to; it stays
 // open until the next configuration or until the library is unloaded. One that cannot be opened
-// is reported to syslog, once, and the lines of its channel are lost.
+// or written is reported to syslog, once, and the lines of its channel are lost.
 // Throws std::invalid_argument naming a sink that makes no sense; nothing is replaced then.
 void configure(const Configuration& configuration);
 

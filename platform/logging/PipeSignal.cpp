@@ -31,18 +31,22 @@ void PipeSignalBlocked::discard() const noexcept
     while (::sigtimedwait(&pipeSignal_, nullptr, &now) < 0 && errno == EINTR) {}
 }
 
-void writeWhole(int descriptor, std::string_view bytes) noexcept
+int writeWhole(int descriptor, std::string_view bytes) noexcept
 {
     const PipeSignalBlocked pipeSignal;
-    while (!bytes.empty()) {
+    int error = 0;
+    while (!bytes.empty() && error == 0) {
         const ssize_t written = ::write(descriptor, bytes.data(), bytes.size());
         if (written > 0)
             bytes.remove_prefix(static_cast<std::size_t>(written));
-        else if (written == 0 || errno != EINTR)
-            break;
+        else if (written == 0)
+            error = EIO;
+        else if (errno != EINTR)
+            error = errno;
     }
-    if (!bytes.empty() && errno == EPIPE)
+    if (error == EPIPE)
         pipeSignal.discard();
+    return error;
 }
 
 void writeToStandardError(std::string_view text) noexcept

@@ -27,8 +27,9 @@ private:
     bool wasPending_ = false; // a signal that is somebody else's business
 };
 
-// Writes the bytes, as many as can be written, whoever reads them or has gone.
-void writeWhole(int descriptor, std::string_view bytes) noexcept;
+// Writes the bytes, as many as can be written, whoever reads them or has gone. Returns what
+// kept the rest from being written, an errno, or 0.
+int writeWhole(int descriptor, std::string_view bytes) noexcept;
 
 // One write to the process's standard error, so that lines of several threads stay whole.
 void writeToStandardError(std::string_view text) noexcept;

@@ -41,4 +41,12 @@ bool RynLogger::isWanted(int level) noexcept
     return anyChannelWants(level);
 }
 
+std::string RynLogger::logProblem() noexcept
+try {
+    const auto channels = activeChannels();
+    return channels ? channels->log.problem() : std::string();
+} catch (...) {
+    return {};
+}
+
 } // namespace RynLog

@@ -37,6 +37,10 @@ public:
     // Whether a line of the level would be written to either channel. Costs one relaxed atomic
     // load, so that a caller need not compose a line that nobody wants.
     static bool isWanted(int level) noexcept;
+
+    // What hinders the lines of the log channel, in words: why its file could not be opened, or
+    // why the last line could not be written. Empty when nothing does.
+    static std::string logProblem() noexcept;
 };
 
 } // namespace RynLog

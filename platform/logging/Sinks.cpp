@@ -10,6 +10,8 @@
 
 #include <cerrno>
 #include <mutex>
+#include <stdexcept>
+#include <string>
 #include <string_view>
 #include <system_error>
 #include <utility>
@@ -24,14 +26,20 @@ namespace {
 
 using LockedSink = spdlog::sinks::base_sink<std::mutex>;
 
+std::runtime_error failure(const std::string& verb, const std::string& what, int error)
+{
+    return std::runtime_error(
+        "cannot " + verb + " " + what + ": " + std::generic_category().message(error));
+}
+
 // One line is one write to an open file, unbuffered, so that lines of several threads and
 // processes stay whole.
 class DescriptorSink : public LockedSink {
 public:
-    explicit DescriptorSink(int descriptor)
+    DescriptorSink(int descriptor, std::string name)
         : LockedSink(std::make_unique<spdlog::pattern_formatter>(
               "%Y-%m-%dT%H:%M:%S.%fZ %v", spdlog::pattern_time_type::utc, "\n")),
-          descriptor_(descriptor)
+          descriptor_(descriptor), name_(std::move(name))
     {
     }
 
@@ -40,19 +48,24 @@ protected:
     {
         spdlog::memory_buf_t line;
         formatter_->format(message, line);
-        writeWhole(descriptor_, std::string_view(line.data(), line.size()));
+        if (const int error = writeWhole(descriptor_, std::string_view(line.data(), line.size())))
+            throw failure("write", name_, error);
     }
 
     void flush_() override {}
 
 private:
     int descriptor_;
+    std::string name_;
 };
 
 class FileSink : public DescriptorSink {
 public:
     // Takes over the descriptor.
-    explicit FileSink(int descriptor) : DescriptorSink(descriptor), owned_(descriptor) {}
+    FileSink(int descriptor, std::string name)
+        : DescriptorSink(descriptor, std::move(name)), owned_(descriptor)
+    {
+    }
     ~FileSink() override { ::close(owned_); }
     FileSink(const FileSink&) = delete;
     FileSink& operator=(const FileSink&) = delete;
@@ -74,24 +87,18 @@ protected:
     void flush_() override {}
 };
 
-void reportUnopened(const std::string& path, int error)
-{
-    std::string line = "cannot open the log file ";
-    appendEscaped(line, path);
-    line += ": " + std::generic_category().message(error) + "; its lines are lost";
-    ::syslog(LOG_DAEMON | LOG_WARNING, "%s", line.c_str());
-}
-
 std::shared_ptr<spdlog::sinks::sink> openFile(const std::string& path)
 {
     // Non-blocking, as a pipe that nobody reads must not hold up a request.
     constexpr int flags = O_WRONLY | O_CREAT | O_APPEND | O_CLOEXEC | O_NOCTTY | O_NONBLOCK;
     constexpr mode_t ownerWritesGroupReads = 0640;
     const int descriptor = ::open(path.c_str(), flags, ownerWritesGroupReads);
-    if (descriptor >= 0)
-        return std::make_shared<FileSink>(descriptor);
-    reportUnopened(path, errno);
-    return nullptr;
+    const int error = errno;
+    std::string name = "the log file ";
+    appendEscaped(name, path);
+    if (descriptor < 0)
+        throw failure("open", name, error);
+    return std::make_shared<FileSink>(descriptor, std::move(name));
 }
 
 } // namespace
@@ -102,7 +109,7 @@ std::shared_ptr<spdlog::sinks::sink> makeSink(const SinkSetting& setting)
     case SinkSetting::Kind::syslog:
         return std::make_shared<SyslogSink>();
     case SinkSetting::Kind::standardError:
-        return std::make_shared<DescriptorSink>(STDERR_FILENO);
+        return std::make_shared<DescriptorSink>(STDERR_FILENO, "the log to standard error");
     case SinkSetting::Kind::file:
         return openFile(setting.path);
     case SinkSetting::Kind::off:

@@ -14,8 +14,8 @@ class sink;
 
 namespace RynLog {
 
-// The sink of a setting; null when it is off or its file cannot be opened, which is reported
-// to syslog.
+// The sink of a setting; null when it is off. Throws std::runtime_error naming the file and the
+// reason when it cannot be opened. The sink throws one like it for a line that cannot be written.
 std::shared_ptr<spdlog::sinks::sink> makeSink(const SinkSetting& setting);
 
 } // namespace RynLog

@@ -104,6 +104,7 @@ TEST(FileSink, ATextCannotForgeALine)
 {
     const LogFile file;
     const ScopedConfiguration configuration({6000, file.sink(), "off"});
+    EXPECT_EQ(RynLogger::logProblem(), "");
     logLine("name\n2026-11-21T01:02:03.000004Z log 6000 forged f(F:1) text");
     ASSERT_THAT(file.lines(), SizeIs(1));
     EXPECT_THAT(file.lines()[0], HasSubstr("name\\n2026-11-21T"));

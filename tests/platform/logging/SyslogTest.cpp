@@ -72,11 +72,36 @@ TEST_F(SyslogSink, AFileThatCannotBeOpenedIsReportedOnceAndItsLinesAreLost)
     logLine("lost");
     EXPECT_EQ(testing::internal::GetCapturedStderr(), "");
     EXPECT_FALSE(RynLog::RynLogger::isWanted(6000));
+    EXPECT_EQ(RynLog::RynLogger::logProblem(),
+        "cannot open the log file /nowhere\\n/at all: No such file or directory");
     const auto lines = takeSyslogLines();
     ASSERT_EQ(lines.size(), 1U);
     EXPECT_EQ(lines[0].priority, daemonWarning);
     EXPECT_THAT(lines[0].text,
         AllOf(HasSubstr("/nowhere\\n/at all"), HasSubstr("No such file or directory")));
+}
+
+TEST_F(SyslogSink, AFileThatTakesNoLinesIsReportedOnce)
+{
+    testing::internal::CaptureStderr();
+    const ScopedConfiguration configuration({6000, "file:/dev/full", "off"});
+    EXPECT_EQ(RynLog::RynLogger::logProblem(), "");
+    logLine("lost");
+    logLine("lost");
+    EXPECT_EQ(testing::internal::GetCapturedStderr(), "");
+    const std::string problem = "cannot write the log file /dev/full: No space left on device";
+    EXPECT_EQ(RynLog::RynLogger::logProblem(), problem);
+    const auto lines = takeSyslogLines();
+    ASSERT_EQ(lines.size(), 1U);
+    EXPECT_EQ(lines[0].priority, daemonWarning);
+    EXPECT_EQ(lines[0].text, problem + "; its lines are lost");
+}
+
+TEST_F(SyslogSink, AProblemWithTheSettingsDoesNotFailOnAFullDisk)
+{
+    EXPECT_NO_THROW(
+        const ScopedConfiguration configuration({6000, "file:/dev/full", "off", "a problem"}));
+    EXPECT_EQ(takeSyslogLines().size(), 1U);
 }
 
 TEST_F(SyslogSink, TheOtherChannelGoesOnWhenAFileCannotBeOpened)
