@@ -4,6 +4,7 @@
 
 #pragma once
 
+#include <cstddef>
 #include <memory>
 #include <string>
 
@@ -27,6 +28,9 @@ public:
     // Appends what comes next, some kilobytes at most for an answer of many objects; false when
     // the answer has ended and nothing was appended.
     virtual bool append(std::string& out) = 0;
+
+    // How many objects are in memory for as long as the answer is not dropped.
+    virtual std::size_t heldObjects() const noexcept = 0;
 };
 
 // Asked from any thread, by many at a time.

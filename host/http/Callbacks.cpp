@@ -25,7 +25,7 @@ const Daemon& daemonOf(const void* closure)
     return *static_cast<const Daemon*>(closure);
 }
 
-// Null where the connection began without memory for it.
+// Null where the connection was one too many, or began without memory for it.
 ClientConnection* clientOf(MHD_Connection* connection)
 {
     const auto* const info =
@@ -46,7 +46,7 @@ std::shared_ptr<const Certificate> showCertificate(const Daemon& daemon, MHD_Con
     return certificate;
 }
 
-ClientConnection& connected(const Daemon& daemon, MHD_Connection* connection)
+ClientConnection* connected(const Daemon& daemon, MHD_Connection* connection)
 {
     const auto* const descriptor =
         ::MHD_get_connection_info(connection, MHD_CONNECTION_INFO_CONNECTION_FD);
@@ -68,9 +68,10 @@ MHD_Result addField(void* head, MHD_ValueKind, const char* name, std::size_t nam
     }
 }
 
-RequestHead headOf(MHD_Connection* connection, const char* url, const char* method)
+RequestHead headOf(
+    MHD_Connection* connection, const char* url, const char* method, const char* version)
 {
-    RequestHead head{method, url, {}};
+    RequestHead head{method, url, version, {}};
     const int count = ::MHD_get_connection_values_n(connection, MHD_HEADER_KIND, nullptr, nullptr);
     head.fields.reserve(static_cast<std::size_t>(count));
     if (::MHD_get_connection_values_n(connection, MHD_HEADER_KIND, &addField, &head) != count)
@@ -87,22 +88,12 @@ std::size_t headSizeOf(MHD_Connection* connection)
 
 } // namespace
 
-MHD_Result mayConnect(void* daemon, const ::sockaddr* address, ::socklen_t) noexcept
-{
-    try {
-        Connections& connections = daemonOf(daemon).service().connections;
-        return connections.hasRoomFor(Address(address)) ? MHD_YES : MHD_NO;
-    } catch (...) {
-        return MHD_NO;
-    }
-}
-
 void connectionChanged(void* daemon, MHD_Connection* connection, void** client,
     MHD_ConnectionNotificationCode what) noexcept
 {
     if (what == MHD_CONNECTION_NOTIFY_STARTED) {
         try {
-            *client = &connected(daemonOf(daemon), connection);
+            *client = connected(daemonOf(daemon), connection);
         } catch (...) {
             *client = nullptr; // its requests end without an answer
         }
@@ -122,7 +113,7 @@ void* requestBegins(void* daemon, const char*, MHD_Connection* connection) noexc
 }
 
 MHD_Result requestGoesOn(void* daemon, MHD_Connection* connection, const char* url,
-    const char* method, const char*, const char* piece, std::size_t* size, void**) noexcept
+    const char* method, const char* version, const char* piece, std::size_t* size, void**) noexcept
 {
     ClientConnection* const client = clientOf(connection);
     if (client == nullptr)
@@ -130,8 +121,8 @@ MHD_Result requestGoesOn(void* daemon, MHD_Connection* connection, const char* u
     try {
         if (!client->exchange) {
             client->exchange.emplace(daemonOf(daemon).service(), *client, *connection);
-            const bool isWell =
-                client->exchange->begin(headOf(connection, url, method), headSizeOf(connection));
+            const bool isWell = client->exchange->begin(
+                headOf(connection, url, method, version), headSizeOf(connection));
             return isWell ? MHD_YES : MHD_NO;
         }
         const std::string_view bytes(piece, *size);

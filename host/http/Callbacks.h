@@ -13,7 +13,6 @@ namespace Host::Http::Callbacks {
 
 // The closure of each is the Daemon. No exception passes.
 
-MHD_Result mayConnect(void* daemon, const ::sockaddr* address, ::socklen_t size) noexcept;
 void connectionChanged(void* daemon, MHD_Connection* connection, void** client,
     MHD_ConnectionNotificationCode what) noexcept;
 void* requestBegins(void* daemon, const char* uri, MHD_Connection* connection) noexcept;

@@ -27,41 +27,51 @@ bool hasFallenSilent(int descriptor)
 
 } // namespace
 
-bool Connections::hasRoomFor(const Address& client)
-{
-    const std::lock_guard lock(mutex_);
-    const auto found = countByNeighbourhood_.find(client.neighbourhood());
-    const bool areTooMany = all_.size() >= limits_.maximumConnections;
-    const bool areTooManyThere = found != countByNeighbourhood_.end() &&
-                                 found->second >= limits_.maximumConnectionsPerAddress;
-    if (!areTooMany && !areTooManyThere)
-        return true;
-    const auto now = Clock::now();
-    if (lastComplaint_ == Clock::time_point{} || now - lastComplaint_ >= complaintInterval) {
-        lastComplaint_ = now;
-        report({"hasRoomFor", "Connections", __LINE__},
-            "refused a connection from " + client.host() + ": there are " +
-                std::to_string(all_.size()) +
-                (areTooMany ? "" : ", too many of them from this address"));
-    }
-    return false;
-}
-
-ClientConnection& Connections::add(
+ClientConnection* Connections::add(
     int descriptor, const Address& client, std::shared_ptr<const Certificate> certificate)
 {
     const std::lock_guard lock(mutex_);
+    const std::string neighbourhood = client.neighbourhood();
+    if (!hasRoomFor(client, neighbourhood)) {
+        ::shutdown(descriptor, SHUT_RDWR);
+        return nullptr;
+    }
     ClientConnection& connection = all_.emplace_back(descriptor, client, std::move(certificate));
     try {
-        ++countByNeighbourhood_[connection.neighbourhood];
+        ++countByNeighbourhood_[neighbourhood];
     } catch (...) {
         all_.pop_back();
         throw;
     }
     // Its first request may begin late, but not last for ever without becoming one.
-    connection.deadline = Clock::now() + limits_.idleTimeout + limits_.requestTimeout;
+    connection.deadline = Clock::now() + patienceIn(Phase::idle);
+    if (isWindingUp_)
+        ::shutdown(descriptor, SHUT_RD);
     watch();
-    return connection;
+    return &connection;
+}
+
+bool Connections::hasRoomFor(const Address& client, const std::string& neighbourhood)
+{
+    const auto found = countByNeighbourhood_.find(neighbourhood);
+    const bool areTooMany = all_.size() >= limits_.maximumConnections;
+    const bool areTooManyThere = found != countByNeighbourhood_.end() &&
+                                 found->second >= limits_.maximumConnectionsPerAddress;
+    if (areTooMany || areTooManyThere)
+        complain(client, areTooMany);
+    return !areTooMany && !areTooManyThere;
+}
+
+void Connections::complain(const Address& client, bool areTooMany)
+{
+    const auto now = Clock::now();
+    if (lastComplaint_ != Clock::time_point{} && now - lastComplaint_ < complaintInterval)
+        return;
+    lastComplaint_ = now;
+    report({"complain", "Connections", __LINE__},
+        "refused a connection from " + client.host() + ": there are " +
+            std::to_string(all_.size()) +
+            (areTooMany ? "" : ", too many of them from this address"));
 }
 
 void Connections::remove(ClientConnection& connection)
@@ -93,6 +103,8 @@ void Connections::enter(ClientConnection& connection, Phase phase)
             --busy_;
             hasEnded = true;
         }
+        if (phase == Phase::idle && isWindingUp_)
+            ::shutdown(connection.descriptor, SHUT_RD);
         connection.phase = phase;
         connection.deadline = Clock::now() + patienceIn(phase);
     }
@@ -151,6 +163,12 @@ bool Connections::waitUntilQuiet(std::chrono::milliseconds patience)
     return changed_.wait_for(lock, patience, [this] { return busy_ == 0; });
 }
 
+void Connections::stopWatching()
+{
+    const std::lock_guard lock(mutex_);
+    isWatchOver_ = true;
+}
+
 void Connections::waitUntilAllAreAwake()
 {
     std::unique_lock lock(mutex_);
@@ -158,10 +176,9 @@ void Connections::waitUntilAllAreAwake()
     changed_.wait(lock, [this] { return asleep_ == 0; });
 }
 
-// REQUIRES: the mutex is held.
 void Connections::watch()
 {
-    if (isWatching_ || isWindingUp_ || all_.empty())
+    if (isWatching_ || isWatchOver_ || all_.empty())
         return;
     try {
         timer_.at(Clock::now() + watchInterval, [this] { closeOverdue(); });
@@ -174,6 +191,8 @@ void Connections::watch()
 void Connections::closeOverdue()
 {
     const std::lock_guard lock(mutex_);
+    isWatching_ = false;
+    watch(); // first: what follows may run out of memory
     const auto now = Clock::now();
     for (const ClientConnection& connection : all_) {
         if (connection.phase == Phase::working)
@@ -183,12 +202,10 @@ void Connections::closeOverdue()
             ::shutdown(connection.descriptor, SHUT_RD);
         if (now < connection.deadline)
             continue;
+        ::shutdown(connection.descriptor, SHUT_RDWR);
         mention({"closeOverdue", "Connections", __LINE__},
             "a client at " + connection.address + " is too slow");
-        ::shutdown(connection.descriptor, SHUT_RDWR);
     }
-    isWatching_ = false;
-    watch();
 }
 
 } // namespace Host::Http

@@ -25,10 +25,9 @@ class Connections {
 public:
     Connections(const Limits& limits, Timer& timer) : limits_(limits), timer_(timer) {}
 
-    // Whether another client at the address may connect. One that may not goes to the log, now
-    // and then.
-    bool hasRoomFor(const Address& client);
-    ClientConnection& add(
+    // Null where that would be one too many, or one too many at its address: the connection ends,
+    // which goes to the log now and then.
+    ClientConnection* add(
         int descriptor, const Address& client, std::shared_ptr<const Certificate> certificate);
     // The exchange must have ended.
     void remove(ClientConnection& connection);
@@ -40,11 +39,14 @@ public:
     bool mayFallAsleep();
     void awake();
 
-    // From now on no connection is kept for a further request; those without one end now.
+    // From now on no connection is kept for a further request; those without one end now, the
+    // others with theirs.
     void windUp();
     bool isWindingUp() const;
     // Waits until no request is at work, at most so long; whether that is so then.
     bool waitUntilQuiet(std::chrono::milliseconds patience);
+    // Nobody is too slow any more. To be called before the timer ends.
+    void stopWatching();
     // No connection may fall asleep any more. Returns when all have woken up.
     void waitUntilAllAreAwake();
 
@@ -52,8 +54,12 @@ private:
     using Clock = std::chrono::steady_clock;
 
     std::chrono::seconds patienceIn(Phase phase) const;
-    void watch();
     void closeOverdue();
+
+    // REQUIRES: the mutex is held.
+    bool hasRoomFor(const Address& client, const std::string& neighbourhood);
+    void complain(const Address& client, bool areTooMany);
+    void watch();
 
     const Limits& limits_;
     Timer& timer_;
@@ -64,6 +70,7 @@ private:
     std::size_t busy_ = 0;   // connections that are not idle
     std::size_t asleep_ = 0; // connections whose thread of service waits for somebody to wake them
     bool isWatching_ = false;
+    bool isWatchOver_ = false;
     bool isWindingUp_ = false;
     bool isAwake_ = false; // for good
     Clock::time_point lastComplaint_{};

@@ -88,7 +88,7 @@ void Daemon::start(const Certificate* certificate)
         options.push_back({MHD_OPTION_HTTPS_PRIORITIES, 0, const_cast<char*>(tlsVersions)});
     }
     options.push_back({MHD_OPTION_END, 0, nullptr});
-    daemon_.reset(::MHD_start_daemon(flagsFor(socket_), 0, &Callbacks::mayConnect, this,
+    daemon_.reset(::MHD_start_daemon(flagsFor(socket_), 0, nullptr, nullptr,
         &Callbacks::requestGoesOn, this, MHD_OPTION_ARRAY, options.data(), MHD_OPTION_END));
     if (!daemon_)
         throw std::runtime_error("cannot serve " + address().text() +
@@ -100,7 +100,7 @@ void Daemon::stopAccepting()
     if (!std::exchange(isAccepting_, false))
         return;
     ::MHD_quiesce_daemon(daemon_.get());
-    socket_.close();
+    socket_.refuse(); // the library's thread may be about to accept from it
 }
 
 } // namespace Host::Http

@@ -33,7 +33,7 @@ public:
     const Address& address() const { return socket_.address(); }
     bool isEncrypted() const { return socket_.isEncrypted(); }
 
-    // Closes the socket; those who are connected stay. Idempotent.
+    // Nobody can connect any more; those who are connected stay. Idempotent.
     void stopAccepting();
 
     // For the library's calls back.

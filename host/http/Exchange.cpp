@@ -14,9 +14,7 @@
 
 #include <microhttpd.h>
 
-#include <algorithm>
 #include <chrono>
-#include <cstring>
 #include <exception>
 #include <new>
 #include <string>
@@ -25,9 +23,6 @@
 namespace Host::Http {
 
 namespace {
-
-// So much of an answer is written before it is sent. One that is no longer has a known length.
-constexpr std::size_t answerHead = std::size_t{64} << 10;
 
 HttpError unauthorized()
 {
@@ -73,6 +68,7 @@ void Exchange::signIn(const RequestHead& head)
         return;
     if (!service_.connections.mayFallAsleep())
         throw overloaded();
+    service_.connections.enter(client_, Phase::working);
     fallAsleep(State::signingIn);
     tryPasswordAt(service_.signIns.admission(client_.neighbourhood, now), *credentials);
 }
@@ -107,12 +103,14 @@ void Exchange::tryPassword(const Credentials& credentials)
             error_ = overloaded();
             return wakeUp();
         }
-        if (!signIns.areDemanded() || signIns.tryPassword(credentials, client_.address))
+        const auto refusal =
+            signIns.areDemanded()
+                ? signIns.tryPassword(credentials, client_.address, client_.neighbourhood, now)
+                : std::nullopt;
+        if (!refusal)
             return wakeUp();
         error_ = unauthorized();
-        const auto end =
-            signIns.delayFailure(client_.neighbourhood, std::chrono::steady_clock::now());
-        service_.timer.at(end, [this] { wakeUp(); });
+        service_.timer.at(*refusal, [this] { wakeUp(); });
     } catch (...) {
         isLost_ = true;
         wakeUp();
@@ -140,6 +138,7 @@ bool Exchange::proceed(std::string_view piece)
     if (isHeadToBeRepeated_) {
         isHeadToBeRepeated_ = false;
         state_ = State::receiving;
+        service_.connections.enter(client_, Phase::receiving);
         return error_ ? refuse(HttpError(*error_)) : true;
     }
     switch (state_) {
@@ -202,7 +201,7 @@ void Exchange::work() noexcept
             error_ = HttpError(Status::internalError, "the request failed; the log tells why");
         }
         if (error_)
-            answer_.reset();
+            answer_.drop();
     } catch (...) {
         report({"work", "Exchange", __LINE__}, "no memory for a request");
         isLost_ = true;
@@ -215,13 +214,7 @@ void Exchange::carryOut()
     const CimXml::Message message(body_, service_.limits.maximumDepth);
     body_ = {};
     requireMatch(head_, message);
-    answer_ = service_.operations.answer(message, caller_);
-    while (piece_.size() < answerHead) {
-        if (answer_->append(piece_))
-            continue;
-        answer_.reset();
-        break;
-    }
+    answer_.begin(service_.operations.answer(message, caller_), service_.unsent);
 }
 
 void Exchange::fallAsleep(State state)
@@ -251,34 +244,11 @@ void Exchange::wakeUp() noexcept
     connections.awake();
 }
 
-::ssize_t Exchange::read(char* to, std::size_t room) noexcept
-{
-    try {
-        // The rest of a piece goes with the next one: each time the library is handed a little, it
-        // makes a packet of it.
-        if (answer_ && piece_.size() - sent_ < room) {
-            piece_.erase(0, sent_);
-            sent_ = 0;
-        }
-        while (answer_ && piece_.size() < room)
-            if (!answer_->append(piece_))
-                answer_.reset();
-    } catch (...) {
-        report({"read", "Exchange", __LINE__}, "an answer broke off");
-        return MHD_CONTENT_READER_END_WITH_ERROR;
-    }
-    if (sent_ == piece_.size())
-        return MHD_CONTENT_READER_END_OF_STREAM;
-    const std::size_t count = std::min(room, piece_.size() - sent_);
-    std::memcpy(to, piece_.data() + sent_, count);
-    sent_ += count;
-    return static_cast<::ssize_t>(count);
-}
-
 bool Exchange::sendAnswer()
 {
+    // The exchange outlives it.
     Response response =
-        answer_ ? Response::inPieces(*this) : Response::whole(piece_); // which outlives it
+        answer_.isWhole() ? Response::whole(answer_.text()) : Response::inPieces(answer_);
     for (const HeaderField& field : answerFieldsFor(head_))
         response.add(field);
     if (service_.connections.isWindingUp())
@@ -290,8 +260,8 @@ bool Exchange::sendAnswer()
 
 bool Exchange::sendError()
 {
-    piece_ = std::string(error_->what()) + "\n";
-    Response response = Response::whole(piece_);
+    errorText_ = std::string(error_->what()) + "\n";
+    Response response = Response::whole(errorText_);
     response.add({"Content-Type", "text/plain; charset=utf-8"});
     if (!error_->cimError().empty())
         response.add({"CIMError", error_->cimError()});

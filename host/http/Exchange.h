@@ -8,13 +8,11 @@
 #include "host/http/BasicCredentials.h"
 #include "host/http/HeaderCheck.h"
 #include "host/http/HttpError.h"
-
-#include <sys/types.h>
+#include "host/http/PendingAnswer.h"
 
 #include <chrono>
 #include <cstddef>
 #include <functional>
-#include <memory>
 #include <optional>
 #include <string>
 #include <string_view>
@@ -37,6 +35,7 @@ struct Service {
     Connections& connections;
     Timer& timer;
     WorkerPool& workers;
+    UnsentObjects& unsent;
 };
 
 // Driven by the thread that serves the connection. While a password is checked or an operation
@@ -55,10 +54,6 @@ public:
     // must be closed without an answer.
     bool begin(const RequestHead& head, std::size_t headSize);
     bool proceed(std::string_view piece);
-
-    // The next part of an answer that was not whole when it began; what the library expects of
-    // a content reader.
-    ::ssize_t read(char* to, std::size_t room) noexcept;
 
 private:
     enum class State {
@@ -100,9 +95,8 @@ private:
     std::optional<HttpError> error_;
     bool isLost_ = false; // not even an error can be told
 
-    std::unique_ptr<CimXml::Answer> answer_; // null when all of it is in the piece
-    std::string piece_;
-    std::size_t sent_ = 0; // of the piece
+    PendingAnswer answer_;
+    std::string errorText_;
 };
 
 } // namespace Host::Http

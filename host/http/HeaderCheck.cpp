@@ -16,6 +16,21 @@ namespace {
 
 constexpr std::string_view mismatch = "header-mismatch";
 
+// A blank before the colon, say, makes a name that others may read as one they know.
+void checkNames(const RequestHead& head)
+{
+    for (const HeaderField& field : head.fields)
+        if (!isToken(field.name))
+            throw HttpError::closing(
+                Status::badRequest, "the name of a header field holds a character it must not");
+}
+
+void checkHost(const RequestHead& head)
+{
+    if (!head.find("Host") && head.version != "HTTP/1.0")
+        throw HttpError::closing(Status::badRequest, "the header field Host is missing");
+}
+
 void checkPathAndMethod(const RequestHead& head)
 {
     if (head.path != "/cimom" && head.path != "/")
@@ -105,21 +120,24 @@ std::string_view nameSpaceIn(std::string_view object)
 
 BodySize bodySizeOf(const RequestHead& head)
 {
+    checkNames(head);
     BodySize body;
     if (const auto expectation = head.find("Expect")) {
         if (!equalIgnoringCase(*expectation, "100-continue"))
-            throw HttpError::framing(
+            throw HttpError::closing(
                 Status::expectationFailed, "the only expectation met is 100-continue");
         body.isAwaited = true;
     }
     const auto length = head.find("Content-Length");
     if (const auto coding = head.find("Transfer-Encoding")) {
         if (!equalIgnoringCase(*coding, "chunked"))
-            throw HttpError::framing(
+            throw HttpError::closing(
                 Status::notImplemented, "the only Transfer-Encoding is chunked");
         if (length)
-            throw HttpError::framing(
+            throw HttpError::closing(
                 Status::badRequest, "both Content-Length and Transfer-Encoding are there");
+        if (head.version == "HTTP/1.0")
+            throw HttpError::closing(Status::badRequest, "HTTP/1.0 knows no Transfer-Encoding");
         return body;
     }
     body.bytes = 0;
@@ -128,14 +146,15 @@ BodySize bodySizeOf(const RequestHead& head)
     const char* const end = length->data() + length->size();
     const auto [stop, error] = std::from_chars(length->data(), end, *body.bytes);
     if (error == std::errc::result_out_of_range)
-        throw HttpError::framing(Status::contentTooLarge, "the body is far too large");
+        throw HttpError::closing(Status::contentTooLarge, "the body is far too large");
     if (error != std::errc{} || stop != end)
-        throw HttpError::framing(Status::badRequest, "the Content-Length is no number");
+        throw HttpError::closing(Status::badRequest, "the Content-Length is no number");
     return body;
 }
 
 CallHead checkHead(const RequestHead& head, const BodySize& body, const Limits& limits)
 {
+    checkHost(head);
     checkPathAndMethod(head);
     CallHead call;
     if (head.method == "M-POST")
@@ -143,7 +162,7 @@ CallHead checkHead(const RequestHead& head, const BodySize& body, const Limits& 
     const std::string prefix = call.extension ? *call.extension + "-" : "";
     checkContent(head);
     if (body.bytes && !head.find("Content-Length"))
-        throw HttpError::framing(Status::lengthRequired,
+        throw HttpError::closing(Status::lengthRequired,
             "neither Content-Length nor Transfer-Encoding says where the body ends");
     if (body.bytes && *body.bytes > limits.maximumBody)
         throw HttpError(Status::contentTooLarge,
@@ -157,14 +176,17 @@ CallHead checkHead(const RequestHead& head, const BodySize& body, const Limits& 
 
 void requireMatch(const CallHead& head, const CimXml::Message& message)
 {
-    if (head.method && !equalIgnoringCase(*head.method, message.methodName()))
-        throw HttpError(Status::badRequest,
-            "CIMMethod is " + *head.method + ", but the body calls " + message.methodName(),
-            mismatch);
-    if (head.object && !equalIgnoringCase(nameSpaceIn(*head.object), message.nameSpace()))
-        throw HttpError(Status::badRequest,
-            "CIMObject is " + *head.object + ", but the body is for " + message.nameSpace(),
-            mismatch);
+    const auto refuse = [](const std::string& reason) {
+        throw HttpError(Status::badRequest, reason, mismatch);
+    };
+    if (!head.method)
+        refuse("the header field CIMMethod is missing");
+    if (!head.object)
+        refuse("the header field CIMObject is missing");
+    if (!equalIgnoringCase(*head.method, message.methodName()))
+        refuse("CIMMethod is " + *head.method + ", but the body calls " + message.methodName());
+    if (!equalIgnoringCase(nameSpaceIn(*head.object), message.nameSpace()))
+        refuse("CIMObject is " + *head.object + ", but the body is for " + message.nameSpace());
 }
 
 std::vector<HeaderField> answerFieldsFor(const CallHead& head)

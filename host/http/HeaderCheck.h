@@ -38,7 +38,8 @@ BodySize bodySizeOf(const RequestHead& head);
 // Throws HttpError with the answer to give when the head is not in order.
 CallHead checkHead(const RequestHead& head, const BodySize& body, const Limits& limits);
 
-// Throws HttpError (header-mismatch) when the head names another operation or namespace.
+// Throws HttpError (header-mismatch) when the head names another operation or namespace, or none:
+// who filters or counts requests on their way by CIMMethod and CIMObject sees every one.
 void requireMatch(const CallHead& head, const CimXml::Message& message);
 
 // The fields that every answer to the call has.

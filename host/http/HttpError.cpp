@@ -38,9 +38,10 @@ HttpError::HttpError(const CimXml::RequestError& error)
 {
 }
 
-HttpError HttpError::framing(unsigned status, const std::string& reason)
+HttpError HttpError::closing(
+    unsigned status, const std::string& reason, std::vector<HeaderField> fields)
 {
-    HttpError error(status, reason);
+    HttpError error(status, reason, {}, std::move(fields));
     error.endsConnection_ = true;
     return error;
 }

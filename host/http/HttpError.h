@@ -51,10 +51,12 @@ public:
     const std::string& cimError() const noexcept { return cimError_; }
     // More for the head of the answer.
     const std::vector<HeaderField>& fields() const noexcept { return fields_; }
-    // Where the request ends is not known, so that nothing can follow it.
+    // Whether the connection is closed behind the answer.
     bool endsConnection() const noexcept { return endsConnection_; }
 
-    static HttpError framing(unsigned status, const std::string& reason);
+    // One that ends the connection: where the request ends is not known, or the client shall go.
+    static HttpError closing(
+        unsigned status, const std::string& reason, std::vector<HeaderField> fields = {});
 
 private:
     unsigned status_;

@@ -21,8 +21,12 @@ struct Limits {
     std::size_t workers = 4;
     std::size_t maximumQueue = 128;
 
-    // How long a connection may be still, how long a request may take to come in, and how long
-    // the client may take to fetch the answer.
+    // Of answers that clients have yet to fetch, all together, but for one that is alone: a sensor
+    // takes four kilobytes. Those of operations that run come on top.
+    std::size_t maximumUnsentObjects = 200'000;
+
+    // How long a connection may be still, be it that the client takes nothing of its answer, how
+    // long a request may take to come in, and how long the client may take to fetch the answer.
     std::chrono::seconds idleTimeout{60};
     std::chrono::seconds requestTimeout{30};
     std::chrono::seconds answerTimeout{600};

@@ -67,6 +67,11 @@ ListeningSocket::ListeningSocket(ListeningSocket&& other) noexcept
 {
 }
 
+void ListeningSocket::refuse()
+{
+    ::shutdown(descriptor_, SHUT_RDWR);
+}
+
 void ListeningSocket::close()
 {
     if (descriptor_ >= 0)

@@ -24,6 +24,9 @@ public:
     bool isEncrypted() const { return isEncrypted_; }
     int descriptor() const { return descriptor_; }
 
+    // Nobody can connect any more; the descriptor stays valid. Idempotent.
+    void refuse();
+
     // Idempotent.
     void close();
 

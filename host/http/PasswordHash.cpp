@@ -6,6 +6,8 @@
 #include <gnutls/gnutls.h>
 
 #include <algorithm>
+#include <charconv>
+#include <cmath>
 #include <cstddef>
 #include <memory>
 
@@ -27,6 +29,22 @@ bool endsWithHash(std::string_view text, std::size_t length)
 {
     const std::size_t last = text.rfind('$');
     return text.size() - last - 1 == length && isEncoded(text.substr(last + 1));
+}
+
+// Of a character of that alphabet.
+int digitOf(char c)
+{
+    constexpr std::string_view alphabet =
+        "./0123456789ABCDEFGHIJKLMNOPQRSTUVWXYZabcdefghijklmnopqrstuvwxyz";
+    return static_cast<int>(alphabet.find(c));
+}
+
+// What the decimal digits at the beginning say.
+double numberIn(std::string_view text)
+{
+    unsigned long number = 0;
+    std::from_chars(text.data(), text.data() + text.size(), number);
+    return static_cast<double>(number);
 }
 
 bool hasShape(std::string_view text)
@@ -51,6 +69,20 @@ bool isPasswordHash(std::string_view text)
         return false;
     const int verdict = ::crypt_checksalt(std::string(text).c_str());
     return verdict == CRYPT_SALT_OK || verdict == CRYPT_SALT_TOO_CHEAP;
+}
+
+double costOf(std::string_view hash)
+{
+    constexpr double block = 0.2;         // of yescrypt, which takes N * r of them
+    constexpr double expensiveSetup = 80; // of bcrypt, which takes 2 to the power of its cost
+    constexpr double round = 0.5;         // of SHA-512
+    if (hash.starts_with("$y$"))          // $y$, a flavor, the logarithm of N and r, less one each
+        return block * std::exp2(digitOf(hash[4]) + 1) * (digitOf(hash[5]) + 1);
+    if (hash.starts_with("$2"))
+        return expensiveSetup * std::exp2(numberIn(hash.substr(4)));
+    constexpr std::string_view rounds = "$6$rounds=";
+    constexpr double usualRounds = 5000;
+    return round * (hash.starts_with(rounds) ? numberIn(hash.substr(rounds.size())) : usualRounds);
 }
 
 bool matchesHash(const std::string& password, const std::string& hash)

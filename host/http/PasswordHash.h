@@ -12,6 +12,10 @@ namespace Host::Http {
 // Whether the text is a whole hash of one of these schemes ($y$, $2b$, $2a$, $2y$, $6$).
 bool isPasswordHash(std::string_view text);
 
+// About how many microseconds it takes to check a password against the hash, for comparison with
+// others. REQUIRES: isPasswordHash(hash).
+double costOf(std::string_view hash);
+
 // Takes as long as the hash demands, whether the password is right or not. Thread-safe.
 // REQUIRES: isPasswordHash(hash).
 bool matchesHash(const std::string& password, const std::string& hash);

@@ -21,11 +21,13 @@ public:
     // The same for the content of a file.
     Passwords(std::string_view text, const std::string& file);
 
-    // Takes long, as the hashes mean it to; no less for a user that is not there.
+    // Takes long, as the hashes mean it to; for a user that is not there as long as for the one
+    // whose hash is the dearest.
     bool matches(const std::string& user, const std::string& password) const;
 
 private:
     std::map<std::string, std::string, std::less<>> hashes_; // by user
+    std::string dearestHash_;
 };
 
 } // namespace Host::Http

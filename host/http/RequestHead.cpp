@@ -15,6 +15,15 @@ constexpr char lowerCase(char c)
 
 } // namespace
 
+bool isToken(std::string_view text)
+{
+    constexpr std::string_view punctuation = "!#$%&'*+-.^_`|~";
+    return !text.empty() && std::all_of(text.begin(), text.end(), [&](char c) {
+        return (c >= '0' && c <= '9') || (lowerCase(c) >= 'a' && lowerCase(c) <= 'z') ||
+               punctuation.find(c) != std::string_view::npos;
+    });
+}
+
 bool equalIgnoringCase(std::string_view a, std::string_view b)
 {
     return std::equal(a.begin(), a.end(), b.begin(), b.end(),
@@ -36,7 +45,7 @@ std::optional<std::string_view> RequestHead::find(std::string_view name) const
         if (!equalIgnoringCase(field.name, name))
             continue;
         if (value)
-            throw HttpError::framing(
+            throw HttpError::closing(
                 Status::badRequest, "the header field " + std::string(name) + " is there twice");
         value = withoutBlanks(field.value);
     }

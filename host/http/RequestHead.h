@@ -15,13 +15,17 @@ namespace Host::Http {
 
 struct RequestHead {
     std::string method;
-    std::string path; // without query
+    std::string path;    // without query
+    std::string version; // such as HTTP/1.1
     std::vector<HeaderField> fields;
 
     // The value without white space at its ends. Names know no letter case. Throws HttpError
     // when the field is there more than once.
     std::optional<std::string_view> find(std::string_view name) const;
 };
+
+// Whether the text can be the name of a header field.
+bool isToken(std::string_view text);
 
 bool equalIgnoringCase(std::string_view a, std::string_view b);
 

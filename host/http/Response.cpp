@@ -2,7 +2,7 @@
 
 #include "host/http/Response.h"
 
-#include "host/http/Exchange.h"
+#include "host/http/PendingAnswer.h"
 
 #include <microhttpd.h>
 
@@ -16,9 +16,9 @@ namespace {
 
 constexpr std::size_t pieceSize = std::size_t{32} << 10;
 
-::ssize_t readPiece(void* exchange, std::uint64_t, char* to, std::size_t room)
+::ssize_t readPiece(void* answer, std::uint64_t, char* to, std::size_t room)
 {
-    return static_cast<Exchange*>(exchange)->read(to, room);
+    return static_cast<PendingAnswer*>(answer)->read(to, room);
 }
 
 } // namespace
@@ -41,10 +41,10 @@ Response Response::whole(const std::string& text)
         text.size(), const_cast<char*>(text.data()), MHD_RESPMEM_PERSISTENT));
 }
 
-Response Response::inPieces(Exchange& exchange)
+Response Response::inPieces(PendingAnswer& answer)
 {
     return Response(::MHD_create_response_from_callback(
-        MHD_SIZE_UNKNOWN, pieceSize, &readPiece, &exchange, nullptr));
+        MHD_SIZE_UNKNOWN, pieceSize, &readPiece, &answer, nullptr));
 }
 
 void Response::add(const HeaderField& field)

@@ -12,15 +12,15 @@ struct MHD_Response;
 
 namespace Host::Http {
 
-class Exchange;
+class PendingAnswer;
 
 // An answer with its head, ready to be sent. All but the destructor throw std::bad_alloc.
 class Response {
 public:
-    // The text must stay as it is until the exchange ends.
+    // The text must stay as it is until the request ends.
     static Response whole(const std::string& text);
-    // The exchange is asked for the pieces.
-    static Response inPieces(Exchange& exchange);
+    // Which is read until then.
+    static Response inPieces(PendingAnswer& answer);
 
     void add(const HeaderField& field);
     // The connection is closed behind it, and the answer says so.

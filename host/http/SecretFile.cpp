@@ -10,7 +10,6 @@
 #include <cerrno>
 #include <cstddef>
 #include <stdexcept>
-#include <string_view>
 #include <system_error>
 
 namespace Host::Http {
@@ -65,17 +64,31 @@ std::string readAll(int descriptor, const std::string& file)
     }
 }
 
-// The mode bits that must not be set.
-std::string readFile(const std::string& file, ::mode_t forbidden, std::string_view advice)
+void requireRegular(const struct stat& status, const std::string& file)
+{
+    if (!S_ISREG(status.st_mode))
+        failAt(file, "it is no regular file");
+}
+
+// An owner can give himself any right.
+void requireSecrecy(const struct stat& status, const std::string& file)
+{
+    requireRegular(status, file);
+    if (status.st_uid != 0 && status.st_uid != ::geteuid())
+        failAt(file, "it belongs neither to root nor to the user who reads it (chown mends that)");
+    if ((status.st_mode & (S_IWGRP | S_IRWXO)) != 0)
+        failAt(file, "others than its owner can change it, or anybody can read it (chmod 600 or "
+                     "640 mends that)");
+}
+
+std::string readFile(
+    const std::string& file, void (*requireFit)(const struct stat& status, const std::string& file))
 {
     const OpenFile open(file);
     struct stat status = {};
     if (::fstat(open.descriptor(), &status) != 0)
         failByErrno(file);
-    if (!S_ISREG(status.st_mode))
-        failAt(file, "it is no regular file");
-    if ((status.st_mode & forbidden) != 0)
-        failAt(file, std::string(advice));
+    requireFit(status, file);
     return readAll(open.descriptor(), file);
 }
 
@@ -83,14 +96,12 @@ std::string readFile(const std::string& file, ::mode_t forbidden, std::string_vi
 
 std::string readSecretFile(const std::string& file)
 {
-    return readFile(file, S_IWGRP | S_IRWXO,
-        "others than its owner can change it, or anybody can read it (chmod 600 or 640 mends "
-        "that)");
+    return readFile(file, requireSecrecy);
 }
 
 std::string readPublicFile(const std::string& file)
 {
-    return readFile(file, 0, "");
+    return readFile(file, requireRegular);
 }
 
 } // namespace Host::Http

@@ -53,9 +53,10 @@ public:
         std::shared_ptr<const Passwords> passwords)
         : limits_(limits), certificate_(std::move(first)),
           signIns_(std::move(passwords), limits.signInDelay), connections_(limits_, timer_),
-          workers_(limits.workers, limits.maximumQueue)
+          unsent_(limits.maximumUnsentObjects), workers_(limits.workers, limits.maximumQueue)
     {
-        service_.emplace(Service{operations, limits_, signIns_, connections_, timer_, workers_});
+        service_.emplace(
+            Service{operations, limits_, signIns_, connections_, timer_, workers_, unsent_});
         try {
             for (ListeningSocket& socket : sockets)
                 daemons_.emplace_back(
@@ -85,6 +86,7 @@ private:
     void end()
     {
         stopAccepting();
+        connections_.stopWatching();
         timer_.end();
         connections_.waitUntilAllAreAwake();
     }
@@ -94,6 +96,7 @@ private:
     SignIns signIns_;
     Timer timer_;
     Connections connections_;
+    UnsentObjects unsent_;
     WorkerPool workers_;
     std::optional<Service> service_;
     std::list<Daemon> daemons_;

@@ -22,19 +22,20 @@ void SignIns::replacePasswords(std::shared_ptr<const Passwords> passwords)
     memory_.forgetAll();
 }
 
-bool SignIns::tryPassword(const Credentials& credentials, const std::string& address)
+std::optional<SignIns::Time> SignIns::tryPassword(const Credentials& credentials,
+    const std::string& address, const std::string& neighbourhood, Time now)
 {
     const auto current = passwords();
     if (!current->matches(credentials.user, credentials.password)) {
         report({"tryPassword", "SignIns", __LINE__},
             "wrong password for \"" + credentials.user + "\" from " + address);
-        return false;
+        return delays_.failed(neighbourhood, now);
     }
     // Not when the passwords have changed meanwhile.
     const std::lock_guard lock(mutex_);
     if (passwords_ == current)
         memory_.remember(credentials, std::chrono::steady_clock::now());
-    return true;
+    return std::nullopt;
 }
 
 std::shared_ptr<const Passwords> SignIns::passwords() const

@@ -10,6 +10,7 @@
 
 #include <memory>
 #include <mutex>
+#include <optional>
 #include <string>
 
 namespace Host::Http {
@@ -34,12 +35,16 @@ public:
     {
         return memory_.knows(credentials, now);
     }
-    // When try() may be called for a client at the address.
-    Time admission(const std::string& address, Time now) { return delays_.admission(address, now); }
-    // Takes long. A failure goes to the log. REQUIRES: areDemanded().
-    bool tryPassword(const Credentials& credentials, const std::string& address);
-    // After a failure: when the client may hear of it.
-    Time delayFailure(const std::string& address, Time now) { return delays_.failed(address, now); }
+    // When a password from the neighbourhood may be tried.
+    Time admission(const std::string& neighbourhood, Time now)
+    {
+        return delays_.admission(neighbourhood, now);
+    }
+    // Takes long. Nothing when the password is right; for a wrong one, which goes to the log with
+    // the address, when the client may hear of it. That is counted from now, the beginning, so
+    // that it does not tell how long the user's hash took. REQUIRES: areDemanded().
+    std::optional<Time> tryPassword(const Credentials& credentials, const std::string& address,
+        const std::string& neighbourhood, Time now);
 
 private:
     std::shared_ptr<const Passwords> passwords() const;

@@ -2,9 +2,28 @@
 
 #include "host/http/Timer.h"
 
+#include "host/http/EventLog.h"
+
+#include <exception>
+#include <string>
 #include <utility>
 
 namespace Host::Http {
+
+namespace {
+
+void perform(const std::function<void()>& action) noexcept
+{
+    try {
+        action();
+    } catch (const std::exception& error) {
+        report({"perform", "Timer", __LINE__}, error.what());
+    } catch (...) {
+        report({"perform", "Timer", __LINE__}, "something failed for no known reason");
+    }
+}
+
+} // namespace
 
 Timer::Timer() : thread_([this] { run(); }) {}
 
@@ -18,7 +37,7 @@ void Timer::at(Time time, std::function<void()> action)
             return;
         }
     }
-    action();
+    perform(action);
 }
 
 void Timer::end()
@@ -51,7 +70,7 @@ void Timer::run()
         const auto action = std::move(first->second);
         actions_.erase(first);
         lock.unlock();
-        action();
+        perform(action);
         lock.lock();
     }
 }

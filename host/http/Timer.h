@@ -21,7 +21,7 @@ public:
     Timer(const Timer&) = delete;
     Timer& operator=(const Timer&) = delete;
 
-    // The action must not throw, and must be quick.
+    // The action must be quick. One that throws has failed, which goes to the log.
     void at(Time time, std::function<void()> action);
     // Does at once what is waiting; from then on at() does so itself. Idempotent, but not for two
     // threads at once.

@@ -28,6 +28,8 @@ public:
         AnswerObjects objects, std::optional<Continuation> continuation);
 
     bool append(std::string& out) override;
+    // With those that earlier answers to pulls told, which are in the same memory.
+    std::size_t heldObjects() const noexcept override { return objects_.heldObjects(); }
 
 private:
     void finish();
@@ -46,6 +48,7 @@ public:
     explicit WrittenAnswer(std::string text) : text_(std::move(text)) {}
 
     bool append(std::string& out) override;
+    std::size_t heldObjects() const noexcept override { return 0; }
 
 private:
     std::string text_; // empty once it was read

@@ -48,8 +48,10 @@ std::string callOf(const std::string& operation, const std::string& parameters)
         R"(</LOCALNAMESPACEPATH>)" +
         parameters + "</IMETHODCALL></SIMPLEREQ></MESSAGE></CIM>";
     return "POST /cimom HTTP/1.1\r\nHost: localhost\r\nContent-Type: application/xml\r\n"
-           "CIMOperation: MethodCall\r\nContent-Length: " +
-           std::to_string(body.size()) + "\r\n\r\n" + body;
+           "CIMOperation: MethodCall\r\nCIMMethod: " +
+           operation +
+           "\r\nCIMObject: root/cimv2\r\nContent-Length: " + std::to_string(body.size()) +
+           "\r\n\r\n" + body;
 }
 
 std::string parameterOf(const std::string& name, const std::string& content)

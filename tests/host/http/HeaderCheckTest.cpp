@@ -18,8 +18,9 @@ using Host::Http::RequestHead;
 
 using Fields = std::vector<HeaderField>;
 
-const Fields usual = {{"Content-Type", "application/xml; charset=\"utf-8\""},
-    {"Content-Length", "10"}, {"CIMOperation", "MethodCall"}};
+const Fields usual = {{"Host", "localhost"}, {"Content-Type", "application/xml; charset=\"utf-8\""},
+    {"Content-Length", "10"}, {"CIMOperation", "MethodCall"}, {"CIMMethod", "GetClass"},
+    {"CIMObject", "root/cimv2"}};
 
 Fields with(HeaderField field, Fields fields = usual)
 {
@@ -45,11 +46,11 @@ CallHead check(const RequestHead& head)
 }
 
 // "ok", or the status with the CIMError.
-std::string verdict(
-    const Fields& fields, const std::string& method = "POST", const std::string& path = "/cimom")
+std::string verdict(const Fields& fields, const std::string& method = "POST",
+    const std::string& path = "/cimom", const std::string& version = "HTTP/1.1")
 {
     try {
-        check({method, path, fields});
+        check({method, path, version, fields});
         return "ok";
     } catch (const HttpError& error) {
         return std::to_string(error.status()) + (error.cimError().empty() ? "" : " ") +
@@ -60,7 +61,7 @@ std::string verdict(
 std::string mismatch(const Fields& fields, const std::string& operation = "GetClass")
 {
     try {
-        requireMatch(check({"POST", "/cimom", fields}), Message(bodyFor(operation)));
+        requireMatch(check({"POST", "/cimom", "HTTP/1.1", fields}), Message(bodyFor(operation)));
         return "ok";
     } catch (const HttpError& error) {
         return error.cimError();
@@ -76,7 +77,7 @@ TEST(HeaderCheckTest, TakesWhatIsInOrder)
     EXPECT_EQ(verdict(with({"Transfer-Encoding", "Chunked"}, without("Content-Length"))), "ok");
     EXPECT_EQ(verdict(with({"Content-Encoding", "identity"})), "ok");
     EXPECT_EQ(verdict(with({"CIMOperation", "methodcall"})), "ok");
-    EXPECT_EQ(verdict({{"content-type", "text/xml"}, {"CONTENT-LENGTH", "0"},
+    EXPECT_EQ(verdict({{"host", ""}, {"content-type", "text/xml"}, {"CONTENT-LENGTH", "0"},
                   {"cimoperation", " MethodCall\t"}}),
         "ok");
 }
@@ -131,6 +132,45 @@ TEST(HeaderCheckTest, RepeatedFieldsThatCountAreRefused)
     EXPECT_EQ(verdict(fields), "ok");
 }
 
+TEST(HeaderCheckTest, NamesMustBeNames)
+{
+    for (const std::string name :
+        {"Content-Length ", "Content-Length\t", "X Y", "", " X", "X\x01", "X(", "X\xC3\xA4"}) {
+        Fields fields = usual;
+        fields.push_back({name, "10"});
+        EXPECT_EQ(verdict(fields), "400") << name;
+    }
+    EXPECT_EQ(verdict(with({"x-9!#$%&'*+.^_`|~", "10"})), "ok");
+}
+
+TEST(HeaderCheckTest, MustNameTheHostSinceHttpOneOne)
+{
+    EXPECT_EQ(verdict(without("Host")), "400");
+    EXPECT_EQ(verdict(without("Host"), "POST", "/cimom", "HTTP/1.0"), "ok");
+    EXPECT_EQ(verdict(with({"Host", ""})), "ok");
+}
+
+TEST(HeaderCheckTest, WhatLeavesTheEndUnclearEndsTheConnection)
+{
+    const auto ends = [](const Fields& fields, const std::string& version = "HTTP/1.1") {
+        try {
+            check({"POST", "/cimom", version, fields});
+            return false;
+        } catch (const HttpError& error) {
+            return error.endsConnection();
+        }
+    };
+    Fields twoLengths = usual;
+    twoLengths.push_back({"Content-Length", "10"});
+    EXPECT_TRUE(ends(twoLengths));
+    EXPECT_TRUE(ends(with({"Content-Length ", "11"})));
+    EXPECT_TRUE(ends(with({"Content-Length", "1 1"})));
+    EXPECT_TRUE(ends(with({"Transfer-Encoding", "chunked"})));
+    EXPECT_TRUE(
+        ends(with({"Transfer-Encoding", "chunked"}, without("Content-Length")), "HTTP/1.0"));
+    EXPECT_FALSE(ends(with({"Content-Type", "text/plain"})));
+}
+
 TEST(HeaderCheckTest, MustBeACallOfAKnownProtocolVersion)
 {
     EXPECT_EQ(verdict(without("CIMOperation")), "400 unsupported-operation");
@@ -143,8 +183,8 @@ TEST(HeaderCheckTest, MustBeACallOfAKnownProtocolVersion)
 
 TEST(HeaderCheckTest, MandatoryPostDeclaresItsExtension)
 {
-    const Fields fields = {{"Content-Type", "text/xml"}, {"Content-Length", "10"},
-        {"42-CIMOperation", "MethodCall"}, {"42-CIMMethod", "GetClass"}};
+    const Fields fields = {{"Host", "localhost"}, {"Content-Type", "text/xml"},
+        {"Content-Length", "10"}, {"42-CIMOperation", "MethodCall"}, {"42-CIMMethod", "GetClass"}};
     const auto declared = [&](const std::string& value) {
         return verdict(with({"Man", value}, fields), "M-POST");
     };
@@ -163,6 +203,8 @@ TEST(HeaderCheckTest, MandatoryPostDeclaresItsExtension)
 TEST(HeaderCheckTest, MethodAndNamespaceMustBeThoseOfTheBody)
 {
     EXPECT_EQ(mismatch(usual), "ok");
+    EXPECT_EQ(mismatch(without("CIMMethod")), "header-mismatch");
+    EXPECT_EQ(mismatch(without("CIMObject")), "header-mismatch");
     for (const std::string method : {"GetClass", "getclass", "Get%43lass"})
         EXPECT_EQ(mismatch(with({"CIMMethod", method})), "ok") << method;
     for (const std::string method : {"GetInstance", "", "GetClass%20"})

@@ -48,6 +48,8 @@ public:
         return true;
     }
 
+    std::size_t heldObjects() const noexcept override { return left_; }
+
 private:
     std::string piece_;
     std::size_t left_;
@@ -113,8 +115,15 @@ inline std::string bodyFor(const std::string& operation, const std::string& name
            "</MESSAGE></CIM>";
 }
 
-inline const std::string usualFields = "Host: localhost\r\nContent-Type: application/xml\r\n"
-                                       "CIMOperation: MethodCall\r\n";
+// The fields that a call of the operation needs, but for its length.
+inline std::string fieldsFor(const std::string& operation)
+{
+    return "Host: localhost\r\nContent-Type: application/xml\r\nCIMOperation: MethodCall\r\n"
+           "CIMMethod: " +
+           operation + "\r\nCIMObject: root/cimv2\r\n";
+}
+
+inline const std::string usualFields = fieldsFor("EnumerateClasses");
 
 inline std::string lengthField(const std::string& body)
 {
@@ -126,6 +135,12 @@ inline std::string post(const std::string& moreFields = "",
 {
     return "POST " + path + " HTTP/1.1\r\n" + usualFields + lengthField(body) + moreFields +
            "\r\n" + body;
+}
+
+inline std::string call(const std::string& operation)
+{
+    const std::string body = bodyFor(operation);
+    return "POST /cimom HTTP/1.1\r\n" + fieldsFor(operation) + lengthField(body) + "\r\n" + body;
 }
 
 class HttpTest : public testing::Test {

@@ -80,7 +80,7 @@ TEST_F(RequestTest, ErrorsLeaveTheConnectionForFurtherRequests)
     EXPECT_EQ(malformed.status, 400);
     EXPECT_EQ(malformed.field("cimerror"), "request-not-well-formed");
     EXPECT_THAT(malformed.body, StartsWith("line 1, byte "));
-    client.send(post("CIMObject: root/other\r\n"));
+    client.send(post("", bodyFor("EnumerateClasses", "other")));
     EXPECT_EQ(client.receive().field("cimerror"), "header-mismatch");
     client.send(post("", bodyFor("EnumerateClasses"), "/elsewhere"));
     EXPECT_EQ(client.receive().status, 404);
@@ -100,8 +100,7 @@ TEST_F(RequestTest, PipelinedRequestsAreAnsweredInTheirOrder)
         operations.answerWith(message.methodName());
     });
     HttpClient client = connect();
-    client.send(
-        post("", bodyFor("First")) + post("", bodyFor("Second")) + post("", bodyFor("Third")));
+    client.send(call("First") + call("Second") + call("Third"));
     EXPECT_EQ(client.receive().body, "<answer/>");
     EXPECT_EQ(client.receive().body, "First"); // which came before
     EXPECT_EQ(client.receive().body, "Second");

@@ -9,7 +9,9 @@
 #include "tests/support/LogCapture.h"
 #include "tests/support/TemporaryFolder.h"
 
+#include <ctime>
 #include <sys/stat.h>
+#include <unistd.h>
 
 namespace HttpTests {
 
@@ -26,6 +28,7 @@ using namespace std::chrono_literals;
 const std::string yescrypt =
     "$y$j75$rXFh3jJw1MMfCN0LMfxTN/$/4dQYJpjC7h6fw/f28qONzbXJtVT0m.gAeXigje2bt4";
 const std::string bcrypt = "$2b$04$abcdefghijklmnopqrstuu2r9OfJnfCsdneAXAGHnS4UpFFP8WIrW";
+const std::string dearBcrypt = "$2b$10$abcdefghijklmnopqrstuuqflPDzB6gcMhKa1rZqKiun2YGL5sa2u";
 const std::string sha512 =
     "$6$saltstring$AIsRs/Ee56G/"
     "tC8MEHhvReZTfx8u3rXXMl6eYrjCG9ibix19DxoMBLogdTET5Ukw9Sf7eZTITsuk0Ry5qulYz.";
@@ -52,6 +55,34 @@ TEST(PasswordsTest, KnowThreeSchemes)
     }
     EXPECT_FALSE(passwords.matches("dora", "secret"));
     EXPECT_FALSE(passwords.matches("", "secret"));
+}
+
+std::clock_t costOfTrying(const Passwords& passwords, const std::string& user)
+{
+    const std::clock_t begin = std::clock();
+    EXPECT_FALSE(passwords.matches(user, "wrong"));
+    return std::clock() - begin;
+}
+
+TEST(PasswordsTest, UnknownUsersCostAsMuchAsTheDearestHash)
+{
+    const Passwords passwords(
+        "ann:" + sha512 + "\nbob:" + dearBcrypt + "\ncarl:" + yescrypt, "file");
+    const std::clock_t dear = costOfTrying(passwords, "bob");
+    EXPECT_LT(costOfTrying(passwords, "ann"), dear / 2);
+    EXPECT_GT(costOfTrying(passwords, "dora"), dear / 2);
+}
+
+TEST(PasswordHashTest, KnowsWhichHashesAreDear)
+{
+    using Host::Http::costOf;
+    EXPECT_LT(costOf(sha512), costOf(dearBcrypt));
+    EXPECT_LT(costOf(bcrypt), costOf(sha512));
+    EXPECT_LT(costOf(yescrypt), costOf(dearBcrypt));
+    EXPECT_LT(costOf(yescrypt), costOf("$y$j9T$"));
+    EXPECT_LT(costOf("$y$j95$"), costOf("$y$j9T$"));
+    EXPECT_LT(costOf("$6$rounds=1000$"), costOf(sha512));
+    EXPECT_LT(costOf(sha512), costOf("$6$rounds=100000$"));
 }
 
 TEST(PasswordsTest, MistakesAreNamedWithTheirLine)
@@ -101,6 +132,21 @@ TEST_F(PasswordFileTest, OthersMustNotReachIt)
     for (const ::mode_t mode : {0644U, 0660U, 0602U, 0606U})
         EXPECT_THAT(problemWith(write(mode)), AllOf(HasSubstr("passwords: "), HasSubstr("chmod")))
             << std::oct << mode;
+}
+
+TEST_F(PasswordFileTest, OthersMustNotOwnIt)
+{
+    if (::geteuid() != 0)
+        GTEST_SKIP() << "only root can give files away";
+    const std::string file = write(0600);
+    constexpr ::uid_t somebody = 65534;
+    ASSERT_EQ(::chown(file.c_str(), somebody, 0), 0);
+    EXPECT_THAT(problemWith(file), AllOf(HasSubstr("passwords: "), HasSubstr("chown")));
+    ::chmod(folder_.path().c_str(), 0711);
+    ASSERT_EQ(::seteuid(somebody), 0);
+    const std::string hisOwn = problemWith(file);
+    ASSERT_EQ(::seteuid(0), 0);
+    EXPECT_EQ(hisOwn, "");
 }
 
 TEST_F(PasswordFileTest, WhatIsNoFileIsRefused)
@@ -176,6 +222,16 @@ TEST(SignInDelaysTest, AreKeptForSoManyAddressesOnly)
     EXPECT_EQ(delays.size(), SignInDelays::capacity);
     EXPECT_EQ(delays.admission("0", start), start);
     EXPECT_GT(delays.admission("20", start), start);
+}
+
+TEST(SignInsTest, RefusalsAreTimedFromTheBeginning)
+{
+    Host::Http::SignIns signIns(
+        std::make_shared<const Passwords>("ann:" + sha512 + "\nbob:" + dearBcrypt, "file"), 1s);
+    const Host::Http::SignIns::Time start{};
+    for (const std::string user : {"ann", "bob", "carl"})
+        EXPECT_EQ(signIns.tryPassword({user, "wrong"}, "address", user, start), start + 1s) << user;
+    EXPECT_EQ(signIns.tryPassword({"ann", "secret"}, "address", "ann", start), std::nullopt);
 }
 
 class SignInTest : public HttpTest {
@@ -290,6 +346,14 @@ TEST_F(SignInTest, SeveralConnectionsGuessNoFaster)
     EXPECT_EQ(one.receive().status, 401);
     EXPECT_EQ(other.receive().status, 401);
     EXPECT_GE(std::chrono::steady_clock::now() - begin, 600ms); // 200 and then 400
+}
+
+TEST_F(SignInTest, WaitingForARefusalIsNotSlow)
+{
+    limits.signInDelay = 2000ms;
+    limits.requestTimeout = 1s;
+    start();
+    EXPECT_EQ(ask(post(wrong)).status, 401);
 }
 
 TEST_F(SignInTest, WhoIsSignedInNeedNotWaitForThoseWhoGuess)

@@ -72,25 +72,25 @@ protected:
     {
         HttpClient client = connect();
         for (int i = 0; i < 20; ++i)
-            expectAnswer(client, post("", bodyFor(i % 10 == 0 ? "Large" : "Small")));
+            expectAnswer(client, call(i % 10 == 0 ? "Large" : "Small"));
     }
     void askEncrypted()
     {
         TlsClient client(tlsPort_);
         for (int i = 0; i < 5; ++i)
-            expectAnswer(client, post("", bodyFor("Large")));
+            expectAnswer(client, call("Large"));
     }
     void askBadly()
     {
         HttpClient client = connect();
         expectAnswer(client, post("", "<CIM"), 400);
-        expectAnswer(client, post("", bodyFor("Fail")), 500);
+        expectAnswer(client, call("Fail"), 500);
         client.send(post().substr(0, 150));
     }
     void breakOff()
     {
         HttpClient client = connect();
-        client.send(post("", bodyFor("Large")));
+        client.send(call("Large"));
         client.receiveSome();
         client.closeHard();
     }

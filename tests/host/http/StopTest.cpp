@@ -5,8 +5,10 @@
 #include "host/http/Timer.h"
 #include "host/http/WorkerPool.h"
 #include "tests/host/http/HttpTest.h"
+#include "tests/support/LogCapture.h"
 
 #include <condition_variable>
+#include <fcntl.h>
 
 namespace HttpTests {
 
@@ -54,6 +56,29 @@ TEST_F(StopTest, LargeAnswersAreFetchedToTheirEnd)
     EXPECT_FALSE(server->waitUntilQuiet(100ms));
     EXPECT_EQ(client.receive().body.size(), 20'000'000U);
     EXPECT_TRUE(server->waitUntilQuiet(5s));
+    EXPECT_TRUE(client.isClosed()); // though its head was sent when nobody thought of an end
+}
+
+TEST_F(StopTest, SlowSendersEndAsEver)
+{
+    limits.requestTimeout = 1s;
+    start();
+    HttpClient client = connect();
+    client.send(post().substr(0, 200));
+    EXPECT_EQ(ask(post()).status, 200); // by now the server has seen the other one's beginning
+    server->stopAccepting();
+    EXPECT_TRUE(server->waitUntilQuiet(10s));
+    EXPECT_TRUE(client.isClosed());
+}
+
+TEST(ListeningSocketTest, RefusesWithoutGivingItsDescriptorAway)
+{
+    Host::Http::ListeningSocket socket({{"127.0.0.1", 0}});
+    const std::uint16_t port = socket.address().port();
+    HttpClient waiting(port);
+    socket.refuse();
+    EXPECT_THROW(HttpClient{port}, std::system_error);
+    EXPECT_NE(::fcntl(socket.descriptor(), F_GETFD), -1);
 }
 
 TEST_F(StopTest, ServerWithoutClientsIsQuietAtOnce)
@@ -108,6 +133,24 @@ TEST(TimerTest, DoesThingsInTheirOrderAndAtTheEndAllThatIsLeft)
         timer.at(now + 3600s, [&] { done.push_back(5); });
     }
     EXPECT_EQ(done, (std::vector<int>{1, 2, 3, 4, 5}));
+}
+
+TEST(TimerTest, GoesOnWhenSomethingFails)
+{
+    const Testing::LogCapture log(6000);
+    int done = 0;
+    {
+        Host::Http::Timer timer;
+        timer.at({}, [] { throw std::runtime_error("it went wrong"); });
+        timer.at({}, [] { throw 1; });
+        timer.at({}, [&] { ++done; });
+        timer.end();
+        timer.at({}, [] { throw std::runtime_error("it is too late"); });
+    }
+    EXPECT_EQ(done, 1);
+    ASSERT_EQ(log.log().size(), 3U);
+    EXPECT_EQ(log.log()[0].text, "it went wrong");
+    EXPECT_EQ(log.log()[2].text, "it is too late");
 }
 
 TEST(WorkerPoolTest, BoundsThoseWhoWaitAndFinishesThem)

@@ -5,6 +5,7 @@
 #include "tests/support/TemporaryFolder.h"
 #include "tests/support/TlsClient.h"
 
+#include <csignal>
 #include <sys/stat.h>
 
 namespace HttpTests {
@@ -125,6 +126,24 @@ TEST_F(TlsTest, ClientsThatDoNotFinishTheHandshakeEnd)
     TlsClient client(port);
     client.send(post());
     EXPECT_EQ(client.receive().status, 200);
+}
+
+// Who writes to them would raise a SIGPIPE, which ends a process that does not care for it.
+TEST_F(TlsTest, ClientsThatVanishAmidTheirAnswerDoNoHarm)
+{
+    struct sigaction action = {};
+    ASSERT_EQ(::sigaction(SIGPIPE, nullptr, &action), 0);
+    ASSERT_EQ(action.sa_handler, SIG_DFL);
+    operations.answerWith(std::string(10'000, 'x'), 1000);
+    for (int i = 0; i < 20; ++i) {
+        TlsClient client(port);
+        client.send(post());
+        client.receiveSome();
+        client.closeHard();
+    }
+    for (int i = 0; i < 100 && operations.answersAlive != 0; ++i)
+        std::this_thread::sleep_for(50ms);
+    EXPECT_EQ(operations.answersAlive, 0);
 }
 
 TEST_F(TlsTest, FilesThatCannotBeUsedAreNamed)
