@@ -2,18 +2,14 @@
 
 // The server as an administrator starts, asks, signals and ends it.
 
-#include "tests/support/HttpClient.h"
+#include "tests/tools/ServeTest.h"
 #include "tests/support/TlsClient.h"
-#include "tests/tools/ServerProcess.h"
-#include "tests/tools/ToolTest.h"
 
 #include <gmock/gmock.h>
 
 #include <pwd.h>
-#include <sys/stat.h>
 #include <unistd.h>
 
-#include <chrono>
 #include <csignal>
 #include <cstdlib>
 
@@ -25,33 +21,6 @@ using testing::EndsWith;
 using testing::HasSubstr;
 using testing::MatchesRegex;
 using testing::StartsWith;
-using namespace std::chrono_literals;
-
-// ann's is "secret", at the least cost.
-const std::string userLine = "ann:$2b$04$abcdefghijklmnopqrstuu2r9OfJnfCsdneAXAGHnS4UpFFP8WIrW\n";
-const std::string asAnn = "Authorization: Basic YW5uOnNlY3JldA==\r\n";
-
-std::string request(const std::string& moreFields = "")
-{
-    const std::string body =
-        R"(<CIM CIMVERSION="2.0" DTDVERSION="2.0"><MESSAGE ID="1" PROTOCOLVERSION="1.0">)"
-        R"(<SIMPLEREQ><IMETHODCALL NAME="EnumerateInstanceNames"><LOCALNAMESPACEPATH>)"
-        R"(<NAMESPACE NAME="root"/><NAMESPACE NAME="cimv2"/></LOCALNAMESPACEPATH>)"
-        R"(<IPARAMVALUE NAME="ClassName"><CLASSNAME NAME="ZUMLO_NumericSensor"/></IPARAMVALUE>)"
-        R"(</IMETHODCALL></SIMPLEREQ></MESSAGE></CIM>)";
-    return "POST /cimom HTTP/1.1\r\nHost: localhost\r\nContent-Type: application/xml\r\n"
-           "CIMOperation: MethodCall\r\nContent-Length: " +
-           std::to_string(body.size()) + "\r\n" + moreFields + "\r\n" + body;
-}
-
-std::size_t sensorsIn(const std::string& answer)
-{
-    std::size_t count = 0;
-    for (auto at = answer.find("<INSTANCENAME "); at != std::string::npos;
-         at = answer.find("<INSTANCENAME ", at + 1))
-        ++count;
-    return count;
-}
 
 // A client whose request the server has seen the head of.
 HttpClient beginRequest(std::uint16_t port)
@@ -62,46 +31,6 @@ HttpClient beginRequest(std::uint16_t port)
     client.receiveSome();
     return client;
 }
-
-HttpReply ask(HttpClient client, const std::string& text = request())
-{
-    client.send(text);
-    return client.receive();
-}
-
-class ServeTest : public ToolTest {
-protected:
-    std::vector<std::string> withModel(std::vector<std::string> arguments = {}) const
-    {
-        arguments.insert(arguments.end(), {"--model", smallModel()});
-        return arguments;
-    }
-
-    std::string secret(const std::string& name, const std::string& content) const
-    {
-        const std::string file = folder_.write(name, content);
-        ::chmod(file.c_str(), 0600);
-        return file;
-    }
-
-    // With certificates of these names.
-    std::vector<std::string> encrypted(
-        const std::string& certificate, std::vector<std::string> arguments = {}) const
-    {
-        const std::string file = (folder_.path() / certificate).string();
-        if (!std::filesystem::exists(file + ".crt"))
-            makeCertificate(file, certificate);
-        arguments.insert(arguments.end(), {"--certificate", file + ".crt", "--key", file + ".key"});
-        return withModel(arguments);
-    }
-
-    // A run that must fail.
-    static Ended failing(std::vector<std::string> arguments)
-    {
-        arguments.insert(arguments.begin(), "serve");
-        return run(arguments, {.environment = {{"RYNLOG_LOG", "off"}}});
-    }
-};
 
 TEST_F(ServeTest, TellsWhereItIsAndAnswersThere)
 {
@@ -257,25 +186,6 @@ TEST_F(ServeTest, HelpTellsTheDefaults)
         EXPECT_THAT(ended.out, HasSubstr(text));
 }
 
-TEST_F(ServeTest, LogThatCannotBeWrittenDoesNotHinderIt)
-{
-    ServerProcess server(withModel(), {{"RYNLOG_LOG", "file:/dev/full"}, {"RYNLOG_LEVEL", "0"}});
-    EXPECT_EQ(ask(HttpClient(server.port())).status, 200);
-    const Ended ended = server.end(SIGTERM);
-    EXPECT_EQ(ended.code, 0);
-    EXPECT_EQ(ended.err, "");
-}
-
-TEST_F(ServeTest, OutputThatCannotBeWrittenIsAFailure)
-{
-    std::vector<std::string> arguments = withModel({"serve", "--port", "0"});
-    if (::geteuid() == 0)
-        arguments.insert(arguments.end(), {"--user", "root"});
-    const Ended ended = run(arguments, {.out = RunOptions::Out::file, .outFile = "/dev/full"});
-    EXPECT_EQ(ended.code, 1);
-    EXPECT_THAT(ended.err, HasSubstr("No space left on device"));
-}
-
 TEST_F(ServeTest, HangupReadsPasswordsAndCertificateAgain)
 {
     const std::string passwords = secret("passwords", "bob" + userLine.substr(3));
@@ -341,38 +251,6 @@ TEST_F(ServeTest, MistakesInTheConfigurationFileAreNamedWithTheirLine)
     EXPECT_THAT(problem("port = many"), StartsWith("serve.conf:2: "));
     EXPECT_THAT(problem("workers = 0"), StartsWith("serve.conf:2: "));
     EXPECT_THAT(failing({"--config", "/none"}).err, HasSubstr("/none: No such file"));
-}
-
-TEST_F(ServeTest, RootIsRenounced)
-{
-    if (::geteuid() != 0)
-        GTEST_SKIP() << "only root can renounce root";
-    const std::string model = SENSOR_PROFILE_SOURCE_DIR "/schema/demo-model.json";
-    if (std::system(
-            ("runuser -u nobody -- test -r '" + model + "' -a -x '" + sensorctl + "'").c_str()) !=
-        0)
-        GTEST_SKIP() << "nobody else can read the build";
-    // A leak is looked for by a process that must not look any more.
-    ServerProcess server(
-        {"--model", model, "--user", "nobody", "--passwords", secret("passwords", userLine)},
-        {{"ASAN_OPTIONS", "detect_leaks=0"}});
-    const std::string status = contentOf("/proc/" + std::to_string(server.id()) + "/status");
-    const std::string id = std::to_string(::getpwnam("nobody")->pw_uid);
-    EXPECT_THAT(status, AllOf(HasSubstr("Uid:\t" + id + "\t" + id + "\t" + id + "\t" + id),
-                            HasSubstr("CapPrm:\t0000000000000000"),
-                            HasSubstr("CapEff:\t0000000000000000"), HasSubstr("NoNewPrivs:\t1")));
-    EXPECT_EQ(ask(HttpClient(server.port()), request(asAnn)).status, 200);
-    server.signal(SIGHUP);
-    EXPECT_TRUE(server.waitForLog("Permission denied; what was read before stays in force"));
-    EXPECT_EQ(ask(HttpClient(server.port()), request(asAnn)).status, 200);
-    EXPECT_EQ(server.end(SIGTERM).code, 0);
-}
-
-TEST_F(ServeTest, UserThatIsNotThereIsTold)
-{
-    const Ended ended = failing(withModel({"--port", "0", "--user", "no-such-user"}));
-    EXPECT_EQ(ended.code, 1);
-    EXPECT_THAT(ended.err, HasSubstr("no-such-user"));
 }
 
 } // namespace

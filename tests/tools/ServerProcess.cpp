@@ -39,7 +39,7 @@ bool names(const std::vector<std::string>& arguments, const std::string& option)
     return std::find(arguments.begin(), arguments.end(), option) != arguments.end();
 }
 
-std::vector<std::string> completed(std::vector<std::string> arguments)
+std::vector<std::string> completed(const std::string& program, std::vector<std::string> arguments)
 {
     const bool isConfigured = names(arguments, "--config");
     if (!isConfigured && !names(arguments, "--port"))
@@ -48,7 +48,7 @@ std::vector<std::string> completed(std::vector<std::string> arguments)
         arguments.insert(arguments.end(), {"--tls-port", "0"});
     if (::geteuid() == 0 && !isConfigured && !names(arguments, "--user"))
         arguments.insert(arguments.end(), {"--user", "root"});
-    arguments.insert(arguments.begin(), {sensorctl, "serve"});
+    arguments.insert(arguments.begin(), {program, "serve"});
     return arguments;
 }
 
@@ -71,10 +71,10 @@ std::vector<char*> pointersTo(std::vector<std::string>& texts)
 
 } // namespace
 
-ServerProcess::ServerProcess(
-    std::vector<std::string> arguments, const std::map<std::string, std::string>& environment)
+ServerProcess::ServerProcess(std::vector<std::string> arguments,
+    const std::map<std::string, std::string>& environment, const std::string& program)
 {
-    std::vector<std::string> command = completed(std::move(arguments));
+    std::vector<std::string> command = completed(program, std::move(arguments));
     std::map<std::string, std::string> variables{{"LC_ALL", "C"}, {"PATH", "/usr/bin:/bin"}};
     for (const auto& [name, value] : environment)
         variables[name] = value;
@@ -84,7 +84,7 @@ ServerProcess::ServerProcess(
     for (const auto& [descriptor, name] : {std::pair(STDOUT_FILENO, "out"), {STDERR_FILENO, "err"}})
         ::posix_spawn_file_actions_addopen(&actions, descriptor, (folder_.path() / name).c_str(),
             O_WRONLY | O_CREAT | O_APPEND, 0666);
-    const int error = ::posix_spawn(&process_, sensorctl.c_str(), &actions, nullptr,
+    const int error = ::posix_spawn(&process_, program.c_str(), &actions, nullptr,
         pointersTo(command).data(), pointersTo(entries).data());
     ::posix_spawn_file_actions_destroy(&actions);
     if (error != 0)

@@ -19,10 +19,11 @@ namespace Testing {
 class ServerProcess {
 public:
     // Serves on any port unless the arguments name one, as the user who runs the tests unless they
-    // name another. Returns when clients can connect; throws std::runtime_error with what it said
-    // on standard error when it ends instead.
+    // name another. The program may be another way to start the tool. Returns when clients can
+    // connect; throws std::runtime_error with what it said on standard error when it ends instead.
     explicit ServerProcess(std::vector<std::string> arguments,
-        const std::map<std::string, std::string>& environment = {});
+        const std::map<std::string, std::string>& environment = {},
+        const std::string& program = sensorctl);
     ~ServerProcess();
     ServerProcess(const ServerProcess&) = delete;
     ServerProcess& operator=(const ServerProcess&) = delete;

@@ -1,5 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
+#include "host/cimxml/Message.h"
 #include "host/http/EventLog.h"
 #include "host/http/Privileges.h"
 #include "host/http/Server.h"
@@ -14,6 +15,7 @@
 #include "tools/serve/Greeting.h"
 #include "tools/serve/Protection.h"
 #include "tools/serve/ServeOptions.h"
+#include "tools/serve/ServiceManager.h"
 #include "tools/serve/Signals.h"
 
 #include <CLI/CLI.hpp>
@@ -21,9 +23,11 @@
 #include <malloc.h>
 #include <unistd.h>
 
+#include <cerrno>
 #include <chrono>
 #include <cstdlib>
 #include <stdexcept>
+#include <system_error>
 
 namespace Tools {
 
@@ -61,24 +65,56 @@ std::vector<Host::Http::Endpoint> endpointsFor(const ServeOptions& options)
     }
 }
 
-void renounceRoot(const std::optional<std::string>& wanted)
+// Who serves, for the log.
+std::string renounceRoot(const std::optional<std::string>& wanted)
 {
     if (!Host::Http::isRoot()) {
         if (wanted && !Host::Http::isUser(*wanted))
             throw std::runtime_error("only root can run the server as another user, " + *wanted);
-        return;
+        return "serving as user " + std::to_string(::geteuid());
     }
     const std::string user = wanted ? *wanted : Host::Http::unprivilegedUser();
     Host::Http::becomeUser(user);
-    report({"renounceRoot", "ServeCommand", __LINE__},
-        Host::Http::isRoot() ? "serving as root, as --user says" : "serving as " + user);
+    return Host::Http::isRoot() ? "serving as root, as --user says" : "serving as " + user;
 }
 
 void requireReadable(const std::string& file)
 {
-    if (::access(file.c_str(), R_OK) != 0)
-        throw std::system_error(errno, std::system_category(),
-            file + ", which the server needs as the user it runs as (--user names another)");
+    if (::access(file.c_str(), R_OK) == 0)
+        return;
+    const std::error_code reason(errno, std::system_category());
+    throw std::system_error(
+        reason, file + ", which the server needs as the user it runs as (--user names another)");
+}
+
+// Makes the object manager load the providers, and those the catalogs of their texts, while root
+// can read them: the user that serves may not.
+void loadProviders(Host::ObjectManager& manager)
+{
+    const Host::CimXml::Message message(
+        R"(<CIM CIMVERSION="2.0" DTDVERSION="2.0"><MESSAGE ID="1" PROTOCOLVERSION="1.0"><SIMPLEREQ>)"
+        R"(<IMETHODCALL NAME="EnumerateInstances"><LOCALNAMESPACEPATH><NAMESPACE NAME="root"/>)"
+        R"(<NAMESPACE NAME="cimv2"/></LOCALNAMESPACEPATH><IPARAMVALUE NAME="ClassName">)"
+        R"(<CLASSNAME NAME="CIM_LogicalElement"/></IPARAMVALUE><IPARAMVALUE NAME="PropertyList">)"
+        R"(<VALUE.ARRAY><VALUE>Caption</VALUE></VALUE.ARRAY></IPARAMVALUE></IMETHODCALL></SIMPLEREQ>)"
+        R"(</MESSAGE></CIM>)");
+    (void)manager.answer(message, {});
+}
+
+// A server whose log is lost from the beginning is nothing to rely on. One that loses it later
+// goes on.
+void beginLog(const std::string& text, Output& out)
+{
+    report({"beginLog", "ServeCommand", __LINE__}, text);
+    const std::string problem = Host::Http::logProblem();
+    if (problem.empty())
+        return;
+    // Where standard error is the log, it takes no complaint either.
+    if (::getenv("RYNLOG_LOG") == std::string("stderr")) {
+        out.write("sensorctl: " + problem + "\n");
+        out.flush();
+    }
+    throw std::runtime_error(problem);
 }
 
 // The memory of an answer serves the next one. Given back to the system, it would have to be mapped
@@ -93,8 +129,12 @@ void keepFreedMemory()
 bool serve(Host::Http::Server& server, const Protection& protection, const Signals& signals,
     std::chrono::seconds gracePeriod)
 {
-    while (signals.wait() == SIGHUP)
+    while (signals.wait() == SIGHUP) {
+        tellServiceManager(ServiceState::reloading);
         protection.renew(server);
+        tellServiceManager(ServiceState::ready);
+    }
+    tellServiceManager(ServiceState::stopping);
     report({"serve", "ServeCommand", __LINE__}, "ending");
     server.stopAccepting();
     constexpr std::chrono::milliseconds interval{20};
@@ -132,21 +172,25 @@ public:
         auto sockets = Host::Http::listenOn(endpoints);
         const auto classes = compileClasses();
         const ProviderFiles files = source_.providerFiles();
-        renounceRoot(options_.user);
         requireReadable(files.sensors);
         if (files.computerSystem)
             requireReadable(*files.computerSystem);
-        if (source_.model())
-            requireReadable(*source_.model());
 
         Host::ObjectManager manager(*classes,
             Host::sensorProfileProviders(files.sensors, files.computerSystem),
             Vorn::getSystemName(), options_.operations);
+        if (Host::Http::isRoot() && options_.user != "root")
+            loadProviders(manager);
+        beginLog(renounceRoot(options_.user), out);
+        if (source_.model())
+            requireReadable(*source_.model());
+
         const std::string text = greeting(sockets, protection.passwords() != nullptr);
         Host::Http::Server server(manager, std::move(sockets), options_.http,
             protection.certificate(), protection.passwords());
         out.write(text);
         out.flush();
+        tellServiceManager(ServiceState::ready);
         if (serve(server, protection, signals, options_.gracePeriod))
             return ExitCode::success;
         complain("requests were still running at the end of the grace period");

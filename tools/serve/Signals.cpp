@@ -14,10 +14,17 @@ Signals::Signals()
     for (const int number : {SIGTERM, SIGINT, SIGHUP})
         ::sigaddset(&signals_, number);
     ::pthread_sigmask(SIG_BLOCK, &signals_, &before_);
+    // What cannot be written is an error of the write.
+    struct sigaction ignoring {};
+    ignoring.sa_handler = SIG_IGN;
+    ::sigaction(SIGPIPE, &ignoring, &pipeBefore_);
+    ::sigaction(SIGXFSZ, &ignoring, &fileBefore_);
 }
 
 Signals::~Signals()
 {
+    ::sigaction(SIGXFSZ, &fileBefore_, nullptr);
+    ::sigaction(SIGPIPE, &pipeBefore_, nullptr);
     ::pthread_sigmask(SIG_SETMASK, &before_, nullptr);
 }
 

@@ -8,8 +8,9 @@
 
 namespace Tools {
 
-// While it lives, SIGTERM, SIGINT and SIGHUP reach nobody but who asks here. To be made before
-// there are other threads, which inherit that.
+// While it lives, SIGTERM, SIGINT and SIGHUP reach nobody but who asks here, and neither a reader
+// that is gone nor a file that is too large ends the process. To be made before there are other
+// threads, which inherit that.
 class Signals {
 public:
     Signals();
@@ -25,6 +26,8 @@ public:
 private:
     sigset_t signals_{};
     sigset_t before_{};
+    struct sigaction pipeBefore_ {};
+    struct sigaction fileBefore_ {};
 };
 
 // Ends the process as the signal does where nobody handles it.

@@ -1,0 +1,231 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// The server and what is around its process: where its output and its log go, who started it and
+// whom it serves as.
+
+#include "tests/tools/ServeTest.h"
+
+#include <gmock/gmock.h>
+
+#include <fcntl.h>
+#include <pwd.h>
+#include <sys/socket.h>
+#include <sys/un.h>
+#include <unistd.h>
+
+#include <array>
+#include <cerrno>
+#include <csignal>
+#include <cstdlib>
+#include <system_error>
+
+namespace {
+
+using namespace Testing;
+using testing::AllOf;
+using testing::EndsWith;
+using testing::HasSubstr;
+using testing::StartsWith;
+
+// What systemd is to a service of the type notify.
+class ServiceManager {
+public:
+    explicit ServiceManager(std::string path)
+        : path_(std::move(path)), socket_(::socket(AF_UNIX, SOCK_DGRAM | SOCK_CLOEXEC, 0))
+    {
+        sockaddr_un address{};
+        address.sun_family = AF_UNIX;
+        path_.copy(address.sun_path, sizeof address.sun_path - 1);
+        const timeval patience{10, 0};
+        if (::setsockopt(socket_, SOL_SOCKET, SO_RCVTIMEO, &patience, sizeof patience) != 0 ||
+            ::bind(socket_, reinterpret_cast<const sockaddr*>(&address), sizeof address) != 0)
+            throw std::system_error(errno, std::generic_category());
+    }
+    ~ServiceManager() { ::close(socket_); }
+    ServiceManager(const ServiceManager&) = delete;
+    ServiceManager& operator=(const ServiceManager&) = delete;
+
+    const std::string& path() const { return path_; }
+
+    // The next message; empty when none comes.
+    std::string told() const
+    {
+        std::array<char, 256> text{};
+        const ssize_t length = ::recv(socket_, text.data(), text.size(), 0);
+        return length < 0 ? "" : std::string(text.data(), static_cast<std::size_t>(length));
+    }
+
+private:
+    std::string path_;
+    int socket_;
+};
+
+class ServeProcessTest : public ServeTest {
+protected:
+    // The arguments of a run that serves on any port as who runs the tests.
+    std::vector<std::string> asIs() const
+    {
+        std::vector<std::string> arguments = withModel({"serve", "--port", "0"});
+        if (::geteuid() == 0)
+            arguments.insert(arguments.end(), {"--user", "root"});
+        return arguments;
+    }
+
+    // A line of shell that starts the tool.
+    std::string script(const std::string& line) const
+    {
+        const std::string file = folder_.write("script", "#!/bin/bash\n" + line + "\n");
+        std::filesystem::permissions(file, std::filesystem::perms::owner_all);
+        return file;
+    }
+};
+
+TEST_F(ServeProcessTest, LogThatCannotBeWrittenAtTheStartIsAFailure)
+{
+    for (const auto& [file, problem] :
+        {std::pair("/dev/full", "cannot write the log file /dev/full: No space left on device"),
+            {"/nowhere/log", "cannot open the log file /nowhere/log: No such file or directory"}}) {
+        const Ended ended =
+            run(asIs(), {.environment = {{"RYNLOG_LOG", std::string("file:") + file}}});
+        EXPECT_EQ(ended.code, 1);
+        EXPECT_EQ(ended.out, "");
+        EXPECT_EQ(ended.err, std::string("sensorctl: ") + problem + "\n");
+    }
+}
+
+TEST_F(ServeProcessTest, StandardOutputTellsOfAFullStandardError)
+{
+    const Ended ended = run(asIs(), {.program = script("exec " + sensorctl + " \"$@\" 2>/dev/full"),
+                                        .environment = {{"RYNLOG_LOG", ""}}});
+    EXPECT_EQ(ended.code, 1);
+    EXPECT_EQ(
+        ended.out, "sensorctl: cannot write the log to standard error: No space left on device\n");
+}
+
+TEST_F(ServeProcessTest, LogThatIsFullLaterDoesNotHinderIt)
+{
+    const std::string log = (folder_.path() / "log").string();
+    const std::string limited = script("ulimit -f 1\nexec " + sensorctl + " \"$@\"");
+    ServerProcess server(withModel({"--passwords", secret("passwords", userLine)}),
+        {{"RYNLOG_LOG", "file:" + log}}, limited);
+    for (int i = 0; i < 20; ++i) {
+        server.signal(SIGHUP);
+        EXPECT_EQ(ask(HttpClient(server.port()), request(asAnn)).status, 200);
+    }
+    const Ended ended = server.end(SIGTERM);
+    EXPECT_EQ(ended.code, 0);
+    EXPECT_EQ(std::filesystem::file_size(log) % 512, 0U);
+    EXPECT_THAT(contentOf(log), Not(HasSubstr("ending")));
+}
+
+TEST_F(ServeProcessTest, LogWhoseReaderIsGoneDoesNotHinderIt)
+{
+    const std::string pipe = (folder_.path() / "pipe").string();
+    ASSERT_EQ(::mkfifo(pipe.c_str(), 0600), 0);
+    const int reader = ::open(pipe.c_str(), O_RDONLY | O_NONBLOCK | O_CLOEXEC);
+    ServerProcess server(withModel(), {{"RYNLOG_LOG", "file:" + pipe}});
+    ::close(reader);
+    server.signal(SIGHUP);
+    EXPECT_EQ(ask(HttpClient(server.port())).status, 200);
+    EXPECT_EQ(server.end(SIGTERM).code, 0);
+}
+
+TEST_F(ServeProcessTest, OutputThatCannotBeWrittenIsAFailure)
+{
+    const Ended ended = run(asIs(), {.out = RunOptions::Out::file, .outFile = "/dev/full"});
+    EXPECT_EQ(ended.code, 1);
+    EXPECT_THAT(ended.err, HasSubstr("No space left on device"));
+}
+
+TEST_F(ServeProcessTest, OutputThatNobodyReadsIsAFailure)
+{
+    const Ended ended = run(asIs(), {.out = RunOptions::Out::abandonedPipe});
+    EXPECT_EQ(ended.signal, 0);
+    EXPECT_EQ(ended.code, 1);
+    EXPECT_EQ(ended.err, "sensorctl: cannot write the output: Broken pipe\n");
+}
+
+TEST_F(ServeProcessTest, ReaderOfTheGreetingMayLeave)
+{
+    ServerProcess server(
+        withModel(), {}, script("exec " + sensorctl + " \"$@\" > >(head --lines=2)"));
+    EXPECT_EQ(ask(HttpClient(server.port())).status, 200);
+    EXPECT_EQ(server.end(SIGTERM).code, 0);
+}
+
+TEST_F(ServeProcessTest, EncryptedClientsThatLeaveInTheMiddleEndNothing)
+{
+    const ServerProcess server(encrypted("one"));
+    for (int i = 0; i < 20; ++i) {
+        TlsClient client(server.port("https"));
+        client.send(request());
+        client.closeHard();
+    }
+    EXPECT_EQ(sensorsIn(ask(HttpClient(server.port())).body), 5U);
+}
+
+TEST_F(ServeProcessTest, ServiceManagerIsToldWhatItDoes)
+{
+    const ServiceManager manager(folder_.path() / "notify");
+    ServerProcess server(withModel(), {{"NOTIFY_SOCKET", manager.path()}});
+    EXPECT_EQ(manager.told(), "READY=1");
+    server.signal(SIGHUP);
+    EXPECT_EQ(manager.told(), "RELOADING=1");
+    EXPECT_EQ(manager.told(), "READY=1");
+    EXPECT_EQ(server.end(SIGTERM).code, 0);
+    EXPECT_EQ(manager.told(), "STOPPING=1");
+}
+
+TEST_F(ServeProcessTest, RootIsRenounced)
+{
+    if (::geteuid() != 0)
+        GTEST_SKIP() << "only root can renounce root";
+    const std::string model = SENSOR_PROFILE_SOURCE_DIR "/schema/demo-model.json";
+    if (std::system(
+            ("runuser -u nobody -- test -r '" + model + "' -a -x '" + sensorctl + "'").c_str()) !=
+        0)
+        GTEST_SKIP() << "nobody else can read the build";
+    // A leak is looked for by a process that must not look any more.
+    ServerProcess server(
+        {"--model", model, "--user", "nobody", "--passwords", secret("passwords", userLine)},
+        {{"ASAN_OPTIONS", "detect_leaks=0"}});
+    const std::string status = contentOf("/proc/" + std::to_string(server.id()) + "/status");
+    const std::string id = std::to_string(::getpwnam("nobody")->pw_uid);
+    EXPECT_THAT(status, AllOf(HasSubstr("Uid:\t" + id + "\t" + id + "\t" + id + "\t" + id),
+                            HasSubstr("CapPrm:\t0000000000000000"),
+                            HasSubstr("CapEff:\t0000000000000000"), HasSubstr("NoNewPrivs:\t1")));
+    EXPECT_EQ(ask(HttpClient(server.port()), request(asAnn)).status, 200);
+    server.signal(SIGHUP);
+    EXPECT_TRUE(server.waitForLog("Permission denied; what was read before stays in force"));
+    EXPECT_EQ(ask(HttpClient(server.port()), request(asAnn)).status, 200);
+    EXPECT_EQ(server.end(SIGTERM).code, 0);
+}
+
+// All that it needs is loaded while it can be read.
+TEST_F(ServeProcessTest, RootIsRenouncedWhereOnlyRootCanReadTheTool)
+{
+    if (::geteuid() != 0)
+        GTEST_SKIP() << "only root can renounce root";
+    const std::string tool = install(); // in a folder of root's
+    std::filesystem::copy(SENSOR_PROFILE_BINARY_DIR "/lib", folder_.path() / "lib");
+    const std::string readable = smallModel();
+    ::chmod(readable.c_str(), 0444);
+    const int model = ::open(readable.c_str(), O_RDONLY);
+    ServerProcess server({"--model", "/dev/fd/" + std::to_string(model), "--user", "nobody"},
+        {{"ASAN_OPTIONS", "detect_leaks=0"}, {"LC_ALL", "fr_FR.UTF-8"}}, tool);
+    ::close(model);
+    EXPECT_TRUE(server.waitForLog("serving as nobody"));
+    const std::string answer =
+        ask(HttpClient(server.port()), request("", "EnumerateInstances")).body;
+    EXPECT_NE(answer.find("<VALUE>Capteur CPU 1</VALUE>"), std::string::npos);
+    EXPECT_EQ(server.end(SIGTERM).code, 0);
+}
+
+TEST_F(ServeProcessTest, UserThatIsNotThereIsTold)
+{
+    const Ended ended = failing(withModel({"--port", "0", "--user", "no-such-user"}));
+    EXPECT_EQ(ended.code, 1);
+    EXPECT_THAT(ended.err, HasSubstr("no-such-user"));
+}
+
+} // namespace

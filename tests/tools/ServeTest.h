@@ -1,0 +1,92 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// A server with a small machine, and the request that its tests ask.
+
+#pragma once
+
+#include "tests/support/HttpClient.h"
+#include "tests/support/TlsClient.h"
+#include "tests/tools/ServerProcess.h"
+#include "tests/tools/ToolTest.h"
+
+#include <sys/stat.h>
+
+#include <filesystem>
+#include <string>
+#include <utility>
+#include <vector>
+
+namespace Testing {
+
+// ann's is "secret", at the least cost.
+inline const std::string userLine =
+    "ann:$2b$04$abcdefghijklmnopqrstuu2r9OfJnfCsdneAXAGHnS4UpFFP8WIrW\n";
+inline const std::string asAnn = "Authorization: Basic YW5uOnNlY3JldA==\r\n";
+
+inline std::string request(
+    const std::string& moreFields = "", const std::string& operation = "EnumerateInstanceNames")
+{
+    const std::string body =
+        R"(<CIM CIMVERSION="2.0" DTDVERSION="2.0"><MESSAGE ID="1" PROTOCOLVERSION="1.0">)"
+        R"(<SIMPLEREQ><IMETHODCALL NAME=")" +
+        operation +
+        R"("><LOCALNAMESPACEPATH><NAMESPACE NAME="root"/><NAMESPACE NAME="cimv2"/></LOCALNAMESPACEPATH>)"
+        R"(<IPARAMVALUE NAME="ClassName"><CLASSNAME NAME="ZUMLO_NumericSensor"/></IPARAMVALUE>)"
+        R"(</IMETHODCALL></SIMPLEREQ></MESSAGE></CIM>)";
+    return "POST /cimom HTTP/1.1\r\nHost: localhost\r\nContent-Type: application/xml\r\n"
+           "CIMOperation: MethodCall\r\nCIMMethod: " +
+           operation +
+           "\r\nCIMObject: root/cimv2\r\nContent-Length: " + std::to_string(body.size()) + "\r\n" +
+           moreFields + "\r\n" + body;
+}
+
+inline std::size_t sensorsIn(const std::string& answer)
+{
+    std::size_t count = 0;
+    for (auto at = answer.find("<INSTANCENAME "); at != std::string::npos;
+         at = answer.find("<INSTANCENAME ", at + 1))
+        ++count;
+    return count;
+}
+
+inline HttpReply ask(HttpClient client, const std::string& text = request())
+{
+    client.send(text);
+    return client.receive();
+}
+
+class ServeTest : public ToolTest {
+protected:
+    std::vector<std::string> withModel(std::vector<std::string> arguments = {}) const
+    {
+        arguments.insert(arguments.end(), {"--model", smallModel()});
+        return arguments;
+    }
+
+    std::string secret(const std::string& name, const std::string& content) const
+    {
+        const std::string file = folder_.write(name, content);
+        ::chmod(file.c_str(), 0600);
+        return file;
+    }
+
+    // With certificates of these names.
+    std::vector<std::string> encrypted(
+        const std::string& certificate, std::vector<std::string> arguments = {}) const
+    {
+        const std::string file = (folder_.path() / certificate).string();
+        if (!std::filesystem::exists(file + ".crt"))
+            makeCertificate(file, certificate);
+        arguments.insert(arguments.end(), {"--certificate", file + ".crt", "--key", file + ".key"});
+        return withModel(arguments);
+    }
+
+    // A run that must fail.
+    static Ended failing(std::vector<std::string> arguments)
+    {
+        arguments.insert(arguments.begin(), "serve");
+        return run(arguments, {.environment = {{"RYNLOG_LOG", "off"}}});
+    }
+};
+
+} // namespace Testing
