@@ -39,8 +39,11 @@ const std::vector<std::string> providerFiles = {"lib/cmpi/libComputerSystemProvi
     "share/locale/ja/LC_MESSAGES/sensor-profile.mo", "share/man/man7/sensor-profile.7.gz",
     "share/man/man8/sensor-profile-register.8.gz", "share/sensor-profile/cim-ancestors.mof",
     "share/sensor-profile/cim-core.mof", "share/sensor-profile/qualifiers.mof",
+    "share/sensor-profile/register/libraries.sh", "share/sensor-profile/register/openpegasus.sh",
+    "share/sensor-profile/register/sfcb.sh", "share/sensor-profile/register/steps.sh",
     "share/sensor-profile/registration/sensor-profile-registration.mof",
     "share/sensor-profile/registration/sensor-profile.reg",
+    "share/sensor-profile/sensor-profile-computer-system.mof",
     "share/sensor-profile/sensor-profile.mof"};
 
 const std::vector<std::string> toolFiles = {"bin/sensorctl", "etc/sensor-profile/serve.conf",

@@ -6,6 +6,7 @@
 
 namespace {
 
+using testing::AllOf;
 using testing::ElementsAre;
 using testing::HasSubstr;
 using testing::IsEmpty;
@@ -15,34 +16,28 @@ namespace fs = std::filesystem;
 
 class OpenPegasus : public RegisterTest {
 protected:
-    OpenPegasus() : RegisterTest({"cimmof", "cimprovider"})
-    {
-        fs::create_directory(path("providers"));
-    }
-
-    // Into a folder of providers that is not the one where the libraries lie.
-    Lines linking(const std::string& action, Lines more = {}) const
-    {
-        more.insert(more.begin(), {action, "--provider-folder", path("providers")});
-        return more;
-    }
+    OpenPegasus() : RegisterTest({"cimmof", "cimprovider"}) {}
 
     Lines modules() const { return linesOf(contentOf(path("modules"))); }
-    Lines links() const { return filesBelow(path("providers")); }
 
-    const std::string classes_ = shared("sensor-profile.mof");
+    std::string linkStep(const std::string& name) const
+    {
+        return "ln -s " + library(name) + " " + path("providers/" + name);
+    }
+
     const std::string registration_ = shared("registration/sensor-profile-registration.mof");
+    const std::string systemStep_ =
+        "cimmof -uc -n root/cimv2 " + shared("sensor-profile-computer-system.mof");
+    const std::string sensorStep_ = "cimmof -uc -n root/cimv2 " + shared("sensor-profile.mof");
+    const std::string registrationStep_ = "cimmof -n root/PG_InterOp " + registration_;
 };
 
 TEST_F(OpenPegasus, registersTheClassesThenTheProviders)
 {
-    const std::string out = mustRun({"register"});
-    EXPECT_THAT(calls(), ElementsAre("cimprovider -l", "cimmof -uc -n root/cimv2 " + classes_,
-                             "cimmof -n root/PG_InterOp " + registration_));
+    EXPECT_THAT(mustRun({"register"}), HasSubstr("Registered in root/cimv2."));
+    EXPECT_THAT(
+        calls(), ElementsAre("cimprovider -l", systemStep_, sensorStep_, registrationStep_));
     EXPECT_THAT(modules(), ElementsAre("SensorProfileModule", "SensorProfileComputerSystemModule"));
-    EXPECT_THAT(out, HasSubstr("Registered in root/cimv2."));
-    EXPECT_THAT(out, HasSubstr("must look for provider libraries in " +
-                               (movedInstallation() / "lib/cmpi").string()));
 }
 
 TEST_F(OpenPegasus, replacesWhatIsRegistered)
@@ -50,10 +45,10 @@ TEST_F(OpenPegasus, replacesWhatIsRegistered)
     mustRun({"register"});
     calls();
     mustRun({"register"});
-    EXPECT_THAT(calls(), ElementsAre("cimprovider -l", "cimmof -uc -n root/cimv2 " + classes_,
-                             "cimprovider -r -m SensorProfileModule",
-                             "cimprovider -r -m SensorProfileComputerSystemModule",
-                             "cimmof -n root/PG_InterOp " + registration_));
+    EXPECT_THAT(
+        calls(), ElementsAre("cimprovider -l", systemStep_, sensorStep_,
+                     "cimprovider -r -m SensorProfileModule",
+                     "cimprovider -r -m SensorProfileComputerSystemModule", registrationStep_));
     EXPECT_THAT(modules(), ElementsAre("SensorProfileModule", "SensorProfileComputerSystemModule"));
 }
 
@@ -76,6 +71,19 @@ TEST_F(OpenPegasus, removesTheProviders)
     EXPECT_THAT(modules(), IsEmpty());
 }
 
+// It cannot be seen which namespace is registered: what somebody takes for the old one may be new.
+TEST_F(OpenPegasus, removesFromNoSingleNamespace)
+{
+    mustRun({"register", "--namespace", "root/old"});
+    mustRun({"register", "--namespace", "root/new"});
+    calls();
+    const Ended ended = runRegister({"remove", "--namespace", "root/old"});
+    EXPECT_EQ(ended.code, 2);
+    EXPECT_THAT(ended.err, HasSubstr("remove takes everything from OpenPegasus"));
+    EXPECT_THAT(calls(), IsEmpty());
+    EXPECT_EQ(modules().size(), 2U);
+}
+
 TEST_F(OpenPegasus, removesNothingWhereNothingIsRegistered)
 {
     EXPECT_THAT(mustRun({"remove"}), HasSubstr("nothing was changed"));
@@ -84,50 +92,59 @@ TEST_F(OpenPegasus, removesNothingWhereNothingIsRegistered)
 
 TEST_F(OpenPegasus, linksTheLibrariesIntoTheFolderOfProviders)
 {
-    EXPECT_THAT(mustRun(linking("register")), Not(HasSubstr("must look")));
+    EXPECT_THAT(mustRun({"register"}), Not(HasSubstr("must look")));
     for (const char* const name : {"libSensorProfileProvider.so", "libComputerSystemProvider.so"})
         EXPECT_EQ(fs::read_symlink(path("providers") + "/" + name), library(name));
     EXPECT_THAT(
         links(), ElementsAre("libComputerSystemProvider.so", "libSensorProfileProvider.so"));
-    mustRun(linking("register"));
+    mustRun({"register"});
     EXPECT_EQ(links().size(), 2U);
-    mustRun(linking("remove"));
+    mustRun({"remove"});
     EXPECT_THAT(links(), IsEmpty());
 }
 
 TEST_F(OpenPegasus, refusesToTakeThePlaceOfAnotherLibrary)
 {
     folder_.write("providers/libComputerSystemProvider.so", "another one");
-    const Ended ended = runRegister(linking("register"));
+    const Ended ended = runRegister({"register"});
     EXPECT_EQ(ended.code, 1);
     EXPECT_THAT(ended.err,
-        HasSubstr(path("providers/libComputerSystemProvider.so") + " is somebody else's"));
-    EXPECT_THAT(ended.err, HasSubstr("Nothing was changed."));
+        AllOf(HasSubstr(path("providers/libComputerSystemProvider.so") + " is somebody else's"),
+            HasSubstr("Nothing was changed.")));
     EXPECT_THAT(calls(), ElementsAre("cimprovider -l"));
     EXPECT_THAT(links(), ElementsAre("libComputerSystemProvider.so"));
 
-    mustRun(linking("register", {"--without-computer-system"}));
+    mustRun({"register", "--without-computer-system"});
     EXPECT_EQ(contentOf(path("providers/libComputerSystemProvider.so")), "another one");
-    mustRun(linking("remove"));
+    mustRun({"remove"});
     EXPECT_THAT(links(), ElementsAre("libComputerSystemProvider.so"));
 }
 
 TEST_F(OpenPegasus, registersTheSensorsWithoutTheComputerSystem)
 {
-    mustRun(linking("register"));
-    mustRun(linking("register", {"--without-computer-system"}));
+    mustRun({"register"});
+    calls();
+    const Lines done = linesOf(mustRun({"register", "--without-computer-system"}));
+    EXPECT_THAT(done, testing::Not(testing::Contains(systemStep_)));
+    EXPECT_THAT(
+        calls(), ElementsAre("cimprovider -l", sensorStep_, "cimprovider -r -m SensorProfileModule",
+                     "cimprovider -r -m SensorProfileComputerSystemModule",
+                     "cimmof -n root/PG_InterOp sensor-profile-registration.mof"));
+    EXPECT_THAT(
+        contentOf(path("sensor-profile.mof")), Not(HasSubstr("class ZUMLO_ComputerSystem")));
     EXPECT_THAT(modules(), ElementsAre("SensorProfileModule"));
     EXPECT_THAT(links(), ElementsAre("libSensorProfileProvider.so"));
-    const std::string document = contentOf(path("sensor-profile-registration.mof"));
-    EXPECT_THAT(document, HasSubstr("ClassName = \"ZUMLO_SensorSystemDevice\""));
-    EXPECT_THAT(document, Not(HasSubstr("ClassName = \"ZUMLO_ComputerSystem\"")));
+    EXPECT_THAT(contentOf(path("sensor-profile-registration.mof")),
+        AllOf(HasSubstr("ClassName = \"ZUMLO_SensorSystemDevice\""),
+            Not(HasSubstr("ComputerSystemProvider")), testing::EndsWith("};\n\n")));
 }
 
 TEST_F(OpenPegasus, registersInAnotherNamespace)
 {
     EXPECT_THAT(mustRun({"register", "--namespace=root/sensors_2"}),
         HasSubstr("Registered in root/sensors_2."));
-    EXPECT_THAT(calls()[1], "cimmof -uc -n root/sensors_2 " + classes_);
+    EXPECT_THAT(
+        calls()[1], "cimmof -uc -n root/sensors_2 " + shared("sensor-profile-computer-system.mof"));
     std::string document = contentOf(registration_);
     for (auto at = document.find("root/cimv2"); at != std::string::npos;
          at = document.find("root/cimv2"))
@@ -137,101 +154,127 @@ TEST_F(OpenPegasus, registersInAnotherNamespace)
 
 TEST_F(OpenPegasus, dryRunPrintsTheStepsAndTakesNone)
 {
-    const Lines planned = linesOf(mustRun(linking("register", {"--dry-run"})));
+    const Lines planned = linesOf(mustRun({"register", "--dry-run"}));
     EXPECT_THAT(calls(), ElementsAre("cimprovider -l"));
     EXPECT_THAT(links(), IsEmpty());
     EXPECT_EQ(planned.back(), "This was a dry run: nothing was done.");
-    const Lines done = linesOf(mustRun(linking("register")));
-    EXPECT_THAT(done,
-        ElementsAre(planned[0], planned[1], planned[2], planned[3], "Registered in root/cimv2."));
-    EXPECT_EQ(planned[2], "cimmof -uc -n root/cimv2 " + classes_);
+    const Lines done = linesOf(mustRun({"register"}));
+    EXPECT_THAT(done, ElementsAre(planned[0], planned[1], planned[2], planned[3], planned[4],
+                          "Registered in root/cimv2."));
+    EXPECT_EQ(planned[2], systemStep_);
 
-    const Lines removal = linesOf(mustRun(linking("remove", {"--dry-run"})));
+    const Lines removal = linesOf(mustRun({"remove", "--dry-run"}));
     EXPECT_EQ(removal[0], "cimprovider -r -m SensorProfileModule");
     EXPECT_EQ(modules().size(), 2U);
     EXPECT_EQ(links().size(), 2U);
+}
+
+// Where the machine has a folder of providers for it, they are linked there.
+TEST_F(OpenPegasus, withoutAFolderTheMachinesIsTaken)
+{
+    std::string expected = "must look for provider libraries in " + library();
+    for (const std::string known : {"/usr/lib/Pegasus/providers", "/usr/lib64/Pegasus/providers"})
+        if (fs::is_directory(known))
+            expected = known + "/libSensorProfileProvider.so\n";
+    EXPECT_THAT(plan({"register"}), HasSubstr(expected));
 }
 
 TEST_F(OpenPegasus, aServerThatDoesNotAnswerIsAFailureBeforeAnyStep)
 {
     failAt(1);
     for (const char* const action : {"register", "remove"}) {
-        const Ended ended = runRegister(linking(action));
+        const Ended ended = runRegister({action});
         EXPECT_EQ(ended.code, 1);
-        EXPECT_THAT(ended.err, HasSubstr("cimprovider -l failed with exit code 7"));
-        EXPECT_THAT(ended.err, HasSubstr("Nothing was changed."));
+        EXPECT_THAT(ended.err, AllOf(HasSubstr("cimprovider -l failed with exit code 7"),
+                                   HasSubstr("Nothing was changed.")));
         EXPECT_THAT(links(), IsEmpty());
         calls();
     }
 }
 
-// Whichever step fails, the message lists the steps before it, the command that it names undoes
-// them, and repeating the registration succeeds.
+// Whichever step fails, the message lists the steps before it, and the command that it names undoes
+// them.
 class EveryStepOfOpenPegasus : public OpenPegasus, public testing::WithParamInterface<std::size_t> {
 protected:
     EveryStepOfOpenPegasus()
     {
         addCommand("ln");
-        folder_.write("modules", "SensorProfileModule\nSensorProfileComputerSystemModule\n");
+        addCommand("rm");
     }
 
-    std::string linkStep(const std::string& name) const
+    // Runs what fails at the parameter's step.
+    std::string failing(const char* action, const Lines& steps)
     {
-        return "ln -s " + library(name) + " " + path("providers/" + name);
+        const std::size_t done = GetParam();
+        calls();
+        failAt(done + 2); // the first call asks what is registered
+        const Ended ended = runRegister({action});
+        failNoMore();
+        EXPECT_EQ(ended.code, 1);
+        EXPECT_THAT(ended.err, HasSubstr(failureAt(done, steps)));
+        return ended.err;
     }
-
-    const Lines steps_ = {linkStep("libSensorProfileProvider.so"),
-        linkStep("libComputerSystemProvider.so"), "cimmof -uc -n root/cimv2 " + classes_,
-        "cimprovider -r -m SensorProfileModule",
-        "cimprovider -r -m SensorProfileComputerSystemModule",
-        "cimmof -n root/PG_InterOp " + registration_};
 };
 
-TEST_P(EveryStepOfOpenPegasus, canFailAndBeUndone)
-{
-    const std::size_t done = GetParam();
-    failAt(done + 2); // the first call asks what is registered
-    const Ended ended = runRegister(linking("register"));
-    EXPECT_EQ(ended.code, 1);
-    std::string report = "failed with exit code 7: " + steps_[done] + "\n";
-    report += done == 0 ? "Nothing was changed.\n" : "Done before that:\n";
-    for (std::size_t i = 0; i < done; ++i)
-        report += "  " + steps_[i] + "\n";
-    if (done > 0)
-        report += "To undo it: sensor-profile-register remove --object-manager openpegasus "
-                  "--namespace root/cimv2 --provider-folder " +
-                  path("providers") + "\n";
-    EXPECT_THAT(ended.err, HasSubstr(report));
-    EXPECT_EQ(calls().size(), done + 2);
+class EveryRegistrationStepOfOpenPegasus : public EveryStepOfOpenPegasus {};
 
-    failNoMore();
-    mustRun({"remove", "--object-manager", "openpegasus", "--namespace", "root/cimv2",
-        "--provider-folder", path("providers")});
+TEST_P(EveryRegistrationStepOfOpenPegasus, canFailAndBeUndone)
+{
+    folder_.write("modules", "SensorProfileModule\nSensorProfileComputerSystemModule\n");
+    const std::string message = failing("register",
+        {linkStep("libSensorProfileProvider.so"), linkStep("libComputerSystemProvider.so"),
+            systemStep_, sensorStep_, "cimprovider -r -m SensorProfileModule",
+            "cimprovider -r -m SensorProfileComputerSystemModule", registrationStep_});
+    EXPECT_THAT(
+        message, HasSubstr("Then, for what was registered before: sensor-profile-register register "
+                           "--object-manager openpegasus --namespace NAMESPACE --provider-folder " +
+                           path("providers") + " (NAMESPACE being the one it was in)\n"));
+
+    mustRunAdvice(message, "To undo it: ", "\n");
     EXPECT_THAT(modules(), IsEmpty());
     EXPECT_THAT(links(), IsEmpty());
-    mustRun(linking("register"));
+    mustRun({"register"});
     EXPECT_EQ(modules().size(), 2U);
 }
 
-INSTANTIATE_TEST_SUITE_P(Steps, EveryStepOfOpenPegasus, testing::Range<std::size_t>(0, 6));
+INSTANTIATE_TEST_SUITE_P(
+    Steps, EveryRegistrationStepOfOpenPegasus, testing::Range<std::size_t>(0, 7));
 
-TEST_F(OpenPegasus, aRemovalThatFailedGoesOnWhereItEnded)
+class EveryRemovalStepOfOpenPegasus : public EveryStepOfOpenPegasus {};
+
+TEST_P(EveryRemovalStepOfOpenPegasus, canFailAndBeRepeated)
 {
-    mustRun(linking("register"));
-    calls();
-    failAt(3);
-    const Ended ended = runRegister(linking("remove"));
-    EXPECT_EQ(ended.code, 1);
-    EXPECT_THAT(ended.err,
-        HasSubstr("failed with exit code 7: cimprovider -r -m SensorProfileComputerSystemModule"));
-    EXPECT_THAT(ended.err, HasSubstr("  cimprovider -r -m SensorProfileModule\n"));
-    EXPECT_THAT(ended.err, Not(HasSubstr("To undo it")));
-    failNoMore();
-    calls();
-    mustRun(linking("remove"));
-    EXPECT_THAT(calls(),
-        ElementsAre("cimprovider -l", "cimprovider -r -m SensorProfileComputerSystemModule"));
+    mustRun({"register"});
+    const std::string message =
+        failing("remove", {"cimprovider -r -m SensorProfileModule",
+                              "cimprovider -r -m SensorProfileComputerSystemModule",
+                              "rm " + path("providers/libSensorProfileProvider.so"),
+                              "rm " + path("providers/libComputerSystemProvider.so")});
+    EXPECT_THAT(message,
+        HasSubstr("To undo it: sensor-profile-register register --object-manager openpegasus "
+                  "--namespace NAMESPACE --provider-folder "));
+    mustRun({"remove"});
+    EXPECT_THAT(modules(), IsEmpty());
     EXPECT_THAT(links(), IsEmpty());
+}
+
+INSTANTIATE_TEST_SUITE_P(Steps, EveryRemovalStepOfOpenPegasus, testing::Range<std::size_t>(0, 4));
+
+TEST_F(OpenPegasus, anUndoneRemovalIsARegistrationAsItWas)
+{
+    mustRun({"register", "--without-computer-system"});
+    calls();
+    failAt(2);
+    const Ended ended = runRegister({"remove"});
+    EXPECT_THAT(ended.err,
+        HasSubstr("To undo it: sensor-profile-register register --object-manager openpegasus "
+                  "--namespace NAMESPACE --without-computer-system --provider-folder "));
+}
+
+TEST_F(OpenPegasus, aFirstRegistrationThatFailsSpeaksOfNoEarlierOne)
+{
+    failAt(2);
+    EXPECT_THAT(runRegister({"register"}).err, Not(HasSubstr("registered before")));
 }
 
 } // namespace

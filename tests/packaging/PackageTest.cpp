@@ -76,7 +76,7 @@ TEST(Scripts, areFreeOfWarnings)
     const std::string complaints = outputOf(
         "cd '" SENSOR_PROFILE_SOURCE_DIR "' && "
         "grep -rlE --exclude-dir=build --exclude-dir=.git '^#!/(usr/)?bin/(env bash|sh)' . | "
-        "xargs shellcheck scripts/packages.sh packaging/sensorctl.bash 2>&1 && echo passed");
+        "xargs shellcheck scripts/packages.sh packaging/sensorctl.bash packaging/register/*.sh 2>&1 && echo passed");
     EXPECT_EQ(complaints, "passed\n");
 }
 

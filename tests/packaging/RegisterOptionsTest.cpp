@@ -78,9 +78,9 @@ TEST_F(BothObjectManagers, mustBeChosenFrom)
 TEST_F(BothObjectManagers, areChosenByName)
 {
     mustRun({"register", "--object-manager", "sfcb"});
-    EXPECT_THAT(calls()[0], testing::StartsWith("sfcbstage "));
+    EXPECT_THAT(calls().at(0), testing::StartsWith("sfcbstage "));
     mustRun({"register", "--object-manager", "openpegasus"});
-    EXPECT_EQ(calls()[0], "cimprovider -l");
+    EXPECT_EQ(calls().at(0), "cimprovider -l");
 }
 
 } // namespace

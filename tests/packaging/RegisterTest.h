@@ -11,6 +11,8 @@
 #include <gmock/gmock.h>
 
 #include <filesystem>
+#include <iterator>
+#include <sstream>
 #include <string>
 #include <vector>
 
@@ -23,6 +25,8 @@ protected:
     // The stand-ins of these commands are all there is of object managers.
     explicit RegisterTest(const Lines& commands)
     {
+        std::filesystem::create_directory(path("providers"));
+        std::filesystem::create_directory(path("stage"));
         for (const std::string& command : commands)
             addCommand(command);
     }
@@ -34,20 +38,43 @@ protected:
             SENSOR_PROFILE_SOURCE_DIR "/tests/packaging/stand-in", path("bin/" + command));
     }
 
-    Ended runRegister(const Lines& arguments) const
+    // Those that the machine has, unless the arguments name others.
+    Ended runAsTyped(const Lines& arguments) const
     {
-        return run(arguments, {.program = program_.string(),
+        return run(arguments, {.program = program_,
                                   .environment = {{"PATH", path("bin") + ":/usr/bin:/bin"},
                                       {"STAND_IN", folder_.path().string()}}});
     }
 
-    // Runs it and expects it to succeed.
-    std::string mustRun(const Lines& arguments) const
+    // With folders of the test's own: the machine may have object managers.
+    Ended runRegister(Lines arguments) const
     {
-        const Ended ended = runRegister(arguments);
-        EXPECT_EQ(ended.code, 0) << ended.err;
-        EXPECT_EQ(ended.err, "");
-        return ended.out;
+        arguments.insert(arguments.begin(),
+            {"--provider-folder", path("providers"), "--staging-folder", path("stage")});
+        return runAsTyped(arguments);
+    }
+
+    // Runs it and expects it to succeed.
+    std::string mustRun(const Lines& arguments) const { return succeeding(runRegister(arguments)); }
+
+    // What would be done with the machine's folders.
+    std::string plan(Lines arguments) const
+    {
+        arguments.emplace_back("--dry-run");
+        return succeeding(runAsTyped(arguments));
+    }
+
+    // Runs the command that a message names between two texts.
+    void mustRunAdvice(
+        const std::string& message, const std::string& before, const std::string& after) const
+    {
+        const std::string start = before + "sensor-profile-register ";
+        const auto begin = message.find(start);
+        ASSERT_NE(begin, std::string::npos) << message;
+        std::istringstream command(message.substr(begin + start.size(),
+            message.find(after, begin + start.size()) - begin - start.size()));
+        const Lines words(std::istream_iterator<std::string>(command), {});
+        succeeding(runAsTyped(words));
     }
 
     // How the stand-ins were called since the last time this was asked.
@@ -64,9 +91,24 @@ protected:
 
     std::string path(const std::string& name) const { return (folder_.path() / name).string(); }
 
-    static std::string library(const std::string& name)
+    Lines links() const { return filesBelow(path("providers")); }
+
+    // What a message begins with when the step after so many done ones fails.
+    static std::string failureAt(std::size_t done, const Lines& steps)
     {
-        return (movedInstallation() / "lib/cmpi" / name).string();
+        std::string message =
+            "failed with exit code 7: " + steps.at(done) + "\nIt may have done part of its work" +
+            (done == 0 ? "; nothing was done before it.\n" : ". Done before it:\n");
+        for (std::size_t i = 0; i < done; ++i)
+            message += "  " + steps[i] + "\n";
+        return message + "To undo it: ";
+    }
+
+    // The folder of the libraries, or one of them.
+    static std::string library(const std::string& name = "")
+    {
+        const auto folder = movedInstallation() / "lib/cmpi";
+        return (name.empty() ? folder : folder / name).string();
     }
 
     static std::string shared(const std::string& name)
@@ -77,7 +119,14 @@ protected:
     TemporaryFolder folder_;
 
 private:
-    std::filesystem::path program_ = movedInstallation() / "sbin/sensor-profile-register";
+    static std::string succeeding(const Ended& ended)
+    {
+        EXPECT_EQ(ended.code, 0) << ended.err;
+        EXPECT_EQ(ended.err, "");
+        return ended.out;
+    }
+
+    const std::string program_ = (movedInstallation() / "sbin/sensor-profile-register").string();
 };
 
 } // namespace Testing

@@ -6,6 +6,7 @@
 
 namespace {
 
+using testing::AllOf;
 using testing::ElementsAre;
 using testing::HasSubstr;
 using testing::IsEmpty;
@@ -15,174 +16,292 @@ namespace fs = std::filesystem;
 
 class Sfcb : public RegisterTest {
 protected:
-    Sfcb() : RegisterTest({"sfcbstage", "sfcbrepos"})
-    {
-        fs::create_directory(path("providers"));
-        fs::create_directory(path("stage"));
-    }
+    Sfcb() : RegisterTest({"sfcbstage", "sfcbrepos"}) {}
 
-    Ended runStaged(const std::string& action, Lines more = {}) const
-    {
-        return runRegister(staged(action, std::move(more)));
-    }
-
-    std::string mustRunStaged(const std::string& action, Lines more = {}) const
-    {
-        return mustRun(staged(action, std::move(more)));
-    }
-
-    Lines links() const { return filesBelow(path("providers")); }
     Lines stage() const { return filesBelow(path("stage")); }
 
-    const std::string stageCall_ = "sfcbstage -s " + path("stage") + " -n root/cimv2 -r " +
-                                   shared("registration/sensor-profile.reg") + " " +
-                                   shared("sensor-profile.mof");
-    const std::string buildCall_ = "sfcbrepos -s " + path("stage") + " -f";
-
-private:
-    Lines staged(const std::string& action, Lines more) const
+    std::string stagedRegistration() const
     {
-        more.insert(more.begin(),
-            {action, "--staging-folder", path("stage"), "--provider-folder", path("providers")});
-        return more;
+        return contentOf(path("stage/regs/sensor-profile.reg"));
     }
+
+    std::string stageStep(const std::string& file, const std::string& nameSpace = "root/cimv2",
+        const std::string& registration = shared("registration/sensor-profile.reg")) const
+    {
+        return "sfcbstage -s " + path("stage") + " -n " + nameSpace + " -r " + registration + " " +
+               shared(file);
+    }
+
+    std::string stagedMof(const std::string& name) const { return path("stage/mofs/" + name); }
+
+    static constexpr const char* computerSystem_ = "sensor-profile-computer-system.mof";
+    static constexpr const char* sensors_ = "sensor-profile.mof";
+    const std::string buildStep_ = "sfcbrepos -s " + path("stage") + " -f";
 };
 
 TEST_F(Sfcb, stagesTheFilesAndBuildsTheRepository)
 {
-    EXPECT_THAT(mustRunStaged("register"), HasSubstr("sfcb must be restarted"));
-    EXPECT_THAT(calls(), ElementsAre(stageCall_, buildCall_));
-    EXPECT_THAT(
-        stage(), ElementsAre("mofs/root/cimv2/sensor-profile.mof", "regs/sensor-profile.reg"));
-    EXPECT_EQ(contentOf(path("stage/regs/sensor-profile.reg")),
-        contentOf(shared("registration/sensor-profile.reg")));
+    EXPECT_THAT(mustRun({"register"}), HasSubstr("sfcb must be restarted"));
+    EXPECT_THAT(calls(), ElementsAre(stageStep(computerSystem_), stageStep(sensors_), buildStep_));
+    EXPECT_THAT(stage(), ElementsAre("mofs/root/cimv2/sensor-profile-computer-system.mof",
+                             "mofs/root/cimv2/sensor-profile.mof", "regs/sensor-profile.reg"));
+    EXPECT_EQ(stagedRegistration(), contentOf(shared("registration/sensor-profile.reg")));
     EXPECT_THAT(
         links(), ElementsAre("libComputerSystemProvider.so", "libSensorProfileProvider.so"));
 }
 
 TEST_F(Sfcb, namesNoFoldersThatNobodyNamed)
 {
-    mustRun({"register"});
-    EXPECT_THAT(calls(),
-        ElementsAre("sfcbstage -n root/cimv2 -r " + shared("registration/sensor-profile.reg") +
-                        " " + shared("sensor-profile.mof"),
-            "sfcbrepos -f"));
+    EXPECT_THAT(plan({"register"}),
+        AllOf(HasSubstr("sfcbstage -n root/cimv2 -r " + shared("registration/sensor-profile.reg") +
+                        " " + shared(sensors_) + "\n"),
+            HasSubstr("\nsfcbrepos -f\n")));
+    EXPECT_THAT(calls(), IsEmpty());
 }
 
 TEST_F(Sfcb, repeatingDoesTheSameAgain)
 {
-    mustRunStaged("register");
+    mustRun({"register"});
     calls();
-    mustRunStaged("register");
-    EXPECT_THAT(calls(), ElementsAre(stageCall_, buildCall_));
-    EXPECT_EQ(stage().size(), 2U);
+    mustRun({"register"});
+    EXPECT_THAT(calls(), ElementsAre(stageStep(computerSystem_), stageStep(sensors_), buildStep_));
+    EXPECT_EQ(stage().size(), 3U);
     EXPECT_EQ(links().size(), 2U);
 }
 
 TEST_F(Sfcb, removesWhatWasStaged)
 {
-    mustRunStaged("register");
+    mustRun({"register"});
     calls();
-    fs::create_directories(path("stage/regs"));
     folder_.write("stage/regs/other.reg", "somebody else's");
-    EXPECT_THAT(mustRunStaged("remove"), HasSubstr("Removed. sfcb must be restarted"));
-    EXPECT_THAT(calls(), ElementsAre(buildCall_));
+    EXPECT_THAT(mustRun({"remove"}), HasSubstr("Removed. sfcb must be restarted"));
+    EXPECT_THAT(calls(), ElementsAre(buildStep_));
     EXPECT_THAT(stage(), ElementsAre("regs/other.reg"));
     EXPECT_THAT(links(), IsEmpty());
-    mustRunStaged("remove");
+    mustRun({"remove"});
     EXPECT_THAT(stage(), ElementsAre("regs/other.reg"));
 }
 
 TEST_F(Sfcb, removingNeedsTheStagingFolder)
 {
-    const Ended ended = runRegister({"remove"});
+    if (fs::exists("/var/lib/sfcb/stage"))
+        GTEST_SKIP() << "this machine has the folder of sfcb";
+    const Ended ended = runAsTyped({"remove", "--dry-run"});
     EXPECT_EQ(ended.code, 1);
     EXPECT_THAT(ended.err, HasSubstr("/var/lib/sfcb/stage is no folder: --staging-folder"));
     EXPECT_THAT(calls(), IsEmpty());
 }
 
-TEST_F(Sfcb, registersInAnotherNamespaceWithoutTheComputerSystem)
+TEST_F(Sfcb, registersWithoutTheComputerSystem)
 {
-    mustRunStaged("register", {"--namespace", "root/sensors", "--without-computer-system"});
+    mustRun({"register"});
+    mustRun({"register", "--without-computer-system"});
     EXPECT_THAT(
-        stage(), ElementsAre("mofs/root/sensors/sensor-profile.mof", "regs/sensor-profile.reg"));
-    EXPECT_THAT(links(), ElementsAre("libSensorProfileProvider.so"));
+        stage(), ElementsAre("mofs/root/cimv2/sensor-profile.mof", "regs/sensor-profile.reg"));
+    EXPECT_THAT(contentOf(stagedMof("root/cimv2/sensor-profile.mof")),
+        Not(HasSubstr("class ZUMLO_ComputerSystem")));
     const Lines shipped = linesOf(contentOf(shared("registration/sensor-profile.reg")));
-    Lines expected(shipped.begin(), shipped.end() - 6); // the block of the computer system
-    for (std::string& line : expected)
-        if (line == "   namespace: root/cimv2")
-            line = "   namespace: root/sensors";
-    EXPECT_EQ(linesOf(contentOf(path("stage/regs/sensor-profile.reg"))), expected);
-    mustRunStaged("remove", {"--namespace", "root/sensors"});
+    EXPECT_EQ(linesOf(stagedRegistration()),
+        Lines(shipped.begin(), shipped.end() - 6)); // but for the block of the computer system
+    EXPECT_THAT(links(), ElementsAre("libSensorProfileProvider.so"));
+}
+
+TEST_F(Sfcb, registeringInAnotherNamespaceMovesTheClasses)
+{
+    mustRun({"register"});
+    folder_.write("stage/mofs/root/cimv2/other.mof", "somebody else's");
+    calls();
+    mustRun({"register", "--namespace", "root/sensors"});
+    EXPECT_THAT(
+        calls(), ElementsAre(stageStep(computerSystem_, "root/sensors", "sensor-profile.reg"),
+                     stageStep(sensors_, "root/sensors", "sensor-profile.reg"), buildStep_));
+    EXPECT_THAT(stage(), ElementsAre("mofs/root/cimv2/other.mof",
+                             "mofs/root/sensors/sensor-profile-computer-system.mof",
+                             "mofs/root/sensors/sensor-profile.mof", "regs/sensor-profile.reg"));
+    std::string expected = contentOf(shared("registration/sensor-profile.reg"));
+    for (auto at = expected.find("root/cimv2"); at != std::string::npos;
+         at = expected.find("root/cimv2"))
+        expected.replace(at, 10, "root/sensors");
+    EXPECT_EQ(stagedRegistration(), expected);
+}
+
+TEST_F(Sfcb, removingFromANamespaceLeavesTheRegistrationOfAnother)
+{
+    mustRun({"register", "--namespace", "root/a"});
+    mustRun({"register", "--namespace", "root/b"});
+    const Lines before = stage();
+    const std::string registration = stagedRegistration();
+    calls();
+    EXPECT_THAT(mustRun({"remove", "--namespace", "root/a"}),
+        AllOf(HasSubstr("The registration stays: it is for root/b."),
+            HasSubstr("Nothing of this product is registered in root/a; nothing was changed.")));
+    EXPECT_THAT(calls(), IsEmpty());
+    EXPECT_EQ(stage(), before);
+    EXPECT_EQ(stagedRegistration(), registration);
+    EXPECT_EQ(links().size(), 2U);
+
+    // Classes that stand there nevertheless.
+    fs::create_directories(path("stage/mofs/root/a"));
+    folder_.write("stage/mofs/root/a/sensor-profile.mof", "");
+    mustRun({"remove", "--namespace", "root/a"});
+    EXPECT_THAT(calls(), ElementsAre(buildStep_));
+    EXPECT_EQ(stage(), before);
+    EXPECT_EQ(links().size(), 2U);
+
+    mustRun({"remove", "--namespace", "root/b"});
     EXPECT_THAT(stage(), IsEmpty());
+    EXPECT_THAT(links(), IsEmpty());
+}
+
+TEST_F(Sfcb, removingWithoutANamespaceRemovesFromWhicheverItIs)
+{
+    mustRun({"register", "--namespace", "root/b"});
+    mustRun({"remove"});
+    EXPECT_THAT(stage(), IsEmpty());
+    EXPECT_THAT(links(), IsEmpty());
 }
 
 TEST_F(Sfcb, dryRunPrintsTheStepsAndTakesNone)
 {
-    const Lines planned = linesOf(mustRunStaged("register", {"--dry-run"}));
-    EXPECT_EQ(planned.at(2), stageCall_);
-    EXPECT_EQ(planned.at(3), buildCall_);
+    const Lines planned = linesOf(mustRun({"register", "--dry-run"}));
+    EXPECT_EQ(planned.at(2), stageStep(computerSystem_));
+    EXPECT_EQ(planned.at(4), buildStep_);
     EXPECT_THAT(calls(), IsEmpty());
     EXPECT_THAT(stage(), IsEmpty());
     EXPECT_THAT(links(), IsEmpty());
-    mustRunStaged("register");
-    EXPECT_THAT(mustRunStaged("remove", {"--dry-run"}), Not(HasSubstr("Removed")));
-    EXPECT_EQ(stage().size(), 2U);
+    mustRun({"register"});
+    EXPECT_THAT(mustRun({"remove", "--dry-run"}), Not(HasSubstr("Removed")));
+    EXPECT_EQ(stage().size(), 3U);
     EXPECT_EQ(links().size(), 2U);
 }
 
-// Whichever step fails, the message lists the steps before it, the command that it names undoes
-// them, and repeating the registration succeeds.
-class EveryStepOfSfcb : public Sfcb, public testing::WithParamInterface<std::size_t> {};
-
-TEST_P(EveryStepOfSfcb, canFailAndBeUndone)
+// Whoever types what a dry run prints gets what the run itself does.
+TEST_F(Sfcb, dryRunCanBeFollowed)
 {
-    addCommand("ln");
-    const Lines steps = {"ln -s " + library("libSensorProfileProvider.so") + " " +
-                             path("providers/libSensorProfileProvider.so"),
-        "ln -s " + library("libComputerSystemProvider.so") + " " +
-            path("providers/libComputerSystemProvider.so"),
-        stageCall_, buildCall_};
-    const std::size_t done = GetParam();
-    failAt(done + 1);
-    const Ended ended = runStaged("register");
-    EXPECT_EQ(ended.code, 1);
-    std::string report = "failed with exit code 7: " + steps[done] + "\n";
-    report += done == 0 ? "Nothing was changed.\n" : "Done before that:\n";
-    for (std::size_t i = 0; i < done; ++i)
-        report += "  " + steps[i] + "\n";
-    if (done > 0)
-        report += "To undo it: sensor-profile-register remove --object-manager sfcb --namespace "
-                  "root/cimv2 --provider-folder " +
-                  path("providers") + " --staging-folder " + path("stage") + "\n";
-    EXPECT_THAT(ended.err, HasSubstr(report));
-    EXPECT_EQ(calls().size(), done + 1);
+    const Lines options = {"register", "--namespace", "root/s", "--without-computer-system"};
+    Lines planning = options;
+    planning.emplace_back("--dry-run");
+    std::string script = mustRun(planning);
+    script = script.substr(0, script.find("This was a dry run"));
+    EXPECT_THAT(script, Not(HasSubstr("/tmp.")));
+    fs::create_directory(path("own"));
+    const Ended followed = run({"-ec", "cd '" + path("own") + "'\n" + script},
+        {.program = "/bin/sh",
+            .environment = {
+                {"PATH", path("bin") + ":/usr/bin:/bin"}, {"STAND_IN", folder_.path().string()}}});
+    ASSERT_EQ(followed.code, 0) << followed.err;
+    const Lines files = stage();
+    const std::string registration = stagedRegistration();
+    const Lines linked = links();
+    EXPECT_EQ(files.size(), 2U);
 
-    failNoMore();
-    mustRun({"remove", "--object-manager", "sfcb", "--namespace", "root/cimv2", "--provider-folder",
-        path("providers"), "--staging-folder", path("stage")});
+    mustRun({"remove"});
+    mustRun(options);
+    EXPECT_EQ(stage(), files);
+    EXPECT_EQ(stagedRegistration(), registration);
+    EXPECT_EQ(links(), linked);
+}
+
+// Whichever step fails, the message lists the steps before it, and the commands that it names
+// lead back to what was before.
+class EveryStepOfSfcb : public Sfcb, public testing::WithParamInterface<std::size_t> {
+protected:
+    EveryStepOfSfcb()
+    {
+        addCommand("ln");
+        addCommand("rm");
+    }
+
+    // Runs what fails at the parameter's step.
+    std::string failing(const Lines& arguments, const Lines& steps)
+    {
+        const std::size_t done = GetParam();
+        calls();
+        failAt(done + 1);
+        const Ended ended = runRegister(arguments);
+        failNoMore();
+        EXPECT_EQ(ended.code, 1);
+        EXPECT_THAT(ended.err, HasSubstr(failureAt(done, steps)));
+        return ended.err;
+    }
+};
+
+class EveryFirstStepOfSfcb : public EveryStepOfSfcb {};
+
+TEST_P(EveryFirstStepOfSfcb, canFailAndBeUndone)
+{
+    const std::string message =
+        failing({"register"}, {"ln -s " + library("libSensorProfileProvider.so") + " " +
+                                      path("providers/libSensorProfileProvider.so"),
+                                  "ln -s " + library("libComputerSystemProvider.so") + " " +
+                                      path("providers/libComputerSystemProvider.so"),
+                                  stageStep(computerSystem_), stageStep(sensors_), buildStep_});
+    EXPECT_THAT(message, Not(HasSubstr("registered before")));
+    mustRunAdvice(message, "To undo it: ", "\n");
     EXPECT_THAT(links(), IsEmpty());
     EXPECT_THAT(stage(), IsEmpty());
-    mustRunStaged("register");
-    EXPECT_EQ(stage().size(), 2U);
+    mustRun({"register"});
+    EXPECT_EQ(stage().size(), 3U);
 }
 
-INSTANTIATE_TEST_SUITE_P(Steps, EveryStepOfSfcb, testing::Range<std::size_t>(0, 4));
+INSTANTIATE_TEST_SUITE_P(Steps, EveryFirstStepOfSfcb, testing::Range<std::size_t>(0, 5));
 
-TEST_F(Sfcb, aRemovalThatFailedBuildsTheRepositoryWhenRepeated)
+class EveryMovingStepOfSfcb : public EveryStepOfSfcb {};
+
+TEST_P(EveryMovingStepOfSfcb, canFailAndLeadBack)
 {
-    mustRunStaged("register");
-    calls();
-    failAt(1);
-    const Ended ended = runStaged("remove");
-    EXPECT_EQ(ended.code, 1);
-    EXPECT_THAT(ended.err, HasSubstr("failed with exit code 7: " + buildCall_));
-    EXPECT_THAT(ended.err, HasSubstr("Done before that:\n  rm "));
-    failNoMore();
-    calls();
-    mustRunStaged("remove");
-    EXPECT_THAT(calls(), ElementsAre(buildCall_));
+    mustRun({"register", "--without-computer-system"});
+    const Lines files = stage();
+    const std::string registration = stagedRegistration();
+    const std::string message = failing({"register", "--namespace", "root/new"},
+        {"ln -s " + library("libComputerSystemProvider.so") + " " +
+                path("providers/libComputerSystemProvider.so"),
+            stageStep(computerSystem_, "root/new", "sensor-profile.reg"),
+            stageStep(sensors_, "root/new", "sensor-profile.reg"),
+            "rm " + stagedMof("root/cimv2/sensor-profile.mof"), buildStep_});
+    mustRunAdvice(message, "To undo it: ", "\n");
+    mustRunAdvice(message, "Then, for what was registered before: ", "\n");
+    EXPECT_EQ(stage(), files);
+    EXPECT_EQ(stagedRegistration(), registration);
+    EXPECT_THAT(links(), ElementsAre("libSensorProfileProvider.so"));
+}
+
+INSTANTIATE_TEST_SUITE_P(Steps, EveryMovingStepOfSfcb, testing::Range<std::size_t>(0, 5));
+
+class EveryRemovalStepOfSfcb : public EveryStepOfSfcb {
+protected:
+    EveryRemovalStepOfSfcb() { mustRun({"register", "--namespace", "root/s"}); }
+
+    std::string failingRemoval()
+    {
+        return failing(
+            {"remove"}, {"rm " + stagedMof("root/s/sensor-profile-computer-system.mof") + " " +
+                                stagedMof("root/s/sensor-profile.mof") + " " +
+                                path("stage/regs/sensor-profile.reg"),
+                            buildStep_, "rm " + path("providers/libSensorProfileProvider.so"),
+                            "rm " + path("providers/libComputerSystemProvider.so")});
+    }
+};
+
+TEST_P(EveryRemovalStepOfSfcb, canFailAndBeUndone)
+{
+    const Lines files = stage();
+    const std::string registration = stagedRegistration();
+    mustRunAdvice(failingRemoval(), "To undo it: ", "\n");
+    EXPECT_EQ(stage(), files);
+    EXPECT_EQ(stagedRegistration(), registration);
+    EXPECT_EQ(links().size(), 2U);
+}
+
+TEST_P(EveryRemovalStepOfSfcb, canFailAndBeRepeated)
+{
+    failingRemoval();
+    mustRun({"remove"});
+    EXPECT_THAT(calls(), testing::Contains(buildStep_));
+    EXPECT_THAT(stage(), IsEmpty());
     EXPECT_THAT(links(), IsEmpty());
 }
+
+INSTANTIATE_TEST_SUITE_P(Steps, EveryRemovalStepOfSfcb, testing::Range<std::size_t>(0, 4));
 
 } // namespace

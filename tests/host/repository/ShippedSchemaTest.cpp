@@ -3,6 +3,7 @@
 // The classes this product ships.
 
 #include "host/repository/Compiler.h"
+#include "tests/support/TemporaryFolder.h"
 
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
@@ -114,6 +115,26 @@ TEST_F(ShippedSchemaTest, theFilesCompileOneByOneToo)
     Host::Compiler compiler;
     compiler.compileFile(Folder / "qualifiers.mof", Cimv2);
     compiler.compileFile(Folder / "cim-ancestors.mof", Cimv2);
+    compiler.compileFile(Folder / "sensor-profile-computer-system.mof", Cimv2);
+    compiler.compileFile(Folder / "sensor-profile.mof", Cimv2);
+    const auto repository = std::move(compiler).finish();
+    EXPECT_NE(repository->findClass(Cimv2, "ZUMLO_SensorSystemDevice"), nullptr);
+}
+
+// As the operations page tells to make one file of those that an object manager may lack.
+TEST_F(ShippedSchemaTest, theAncestorsCompileAsOneFile)
+{
+    std::string all;
+    for (const char* const name : {"qualifiers.mof", "cim-core.mof", "cim-ancestors.mof"}) {
+        std::ifstream file(Folder / name);
+        for (std::string line; std::getline(file, line);)
+            if (!line.starts_with("#pragma include"))
+                all += line + '\n';
+    }
+    const Testing::TemporaryFolder files;
+    Host::Compiler compiler;
+    compiler.compileFile(files.write("10-cim.mof", all), Cimv2);
+    compiler.compileFile(Folder / "sensor-profile-computer-system.mof", Cimv2);
     compiler.compileFile(Folder / "sensor-profile.mof", Cimv2);
     const auto repository = std::move(compiler).finish();
     EXPECT_NE(repository->findClass(Cimv2, "ZUMLO_SensorSystemDevice"), nullptr);

@@ -1,0 +1,60 @@
+# Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+# shellcheck shell=bash disable=SC2154
+
+# The provider libraries where the object manager looks for them. Sourced by
+# sensor-profile-register.
+
+choose_provider_folder() {
+  local each known
+  is_folder_known=true
+  used_folder=$provider_folder
+  [ -z "$used_folder" ] || return 0
+  read -ra known < <(folders_of "$object_manager")
+  for each in "${known[@]}"; do
+    if [ -d "$each" ]; then
+      used_folder=$each
+      return
+    fi
+  done
+  used_folder=$library_folder
+  is_folder_known=false
+}
+
+wants_library() { "$with_computer_system" || [ "$1" != libComputerSystemProvider.so ]; }
+
+is_same_folder() { [ "$(readlink -f "$1")" = "$(readlink -f "$2")" ]; }
+
+is_our_link() { [ -L "$1" ] && [ "$(readlink "$1")" = "$library_folder/${1##*/}" ]; }
+
+is_foreign() { { [ -e "$1" ] || [ -L "$1" ]; } && ! is_our_link "$1"; }
+
+link_libraries() {
+  local each
+  is_same_folder "$used_folder" "$library_folder" && return
+  for each in "${libraries[@]}"; do
+    if wants_library "$each" && is_foreign "$used_folder/$each"; then
+      refuse "$used_folder/$each is somebody else's; it must be put out of the way first"
+    fi
+  done
+  for each in "${libraries[@]}"; do
+    if ! is_our_link "$used_folder/$each"; then
+      if wants_library "$each"; then step ln -s "$library_folder/$each" "$used_folder/$each"; fi
+    elif ! wants_library "$each"; then
+      step rm "$used_folder/$each"
+    fi
+  done
+}
+
+unlink_libraries() {
+  local each
+  for each in "${libraries[@]}"; do
+    if is_our_link "$used_folder/$each"; then step rm "$used_folder/$each"; fi
+  done
+}
+
+remind_of_folder() {
+  if ! "$is_folder_known"; then
+    echo "The object manager must look for provider libraries in $library_folder," \
+      "or --provider-folder must say where it looks."
+  fi
+}
