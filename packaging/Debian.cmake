@@ -6,8 +6,10 @@ set(CPACK_PACKAGE_NAME sensor-profile)
 # Each package says what it is by itself.
 set(CPACK_PACKAGE_DESCRIPTION_SUMMARY "")
 set(CPACK_PACKAGE_CONTACT "The sensor-profile authors <sensor-profile@example.org>")
-set(CPACK_COMPONENTS_ALL provider tool)
+# Each package is a group: a component of the installation, and what only a package has.
+set(CPACK_COMPONENTS_ALL provider provider-debian tool tool-debian)
 set(CPACK_DEB_COMPONENT_INSTALL ON)
+set(CPACK_COMPONENTS_GROUPING ONE_PER_GROUP)
 set(CPACK_STRIP_FILES ON)
 # The unit and its settings lie outside of /usr.
 set(CPACK_SET_DESTDIR ON)
@@ -21,7 +23,7 @@ set(CPACK_DEBIAN_PACKAGE_SHLIBDEPS ON)
 set(CPACK_DEBIAN_PACKAGE_CONTROL_STRICT_PERMISSION ON)
 
 set(CPACK_DEBIAN_PROVIDER_PACKAGE_NAME sensor-profile-provider)
-set(CPACK_DEBIAN_PROVIDER_PACKAGE_SECTION libs)
+set(CPACK_DEBIAN_PROVIDER_PACKAGE_SECTION admin)
 set(CPACK_DEBIAN_PROVIDER_DESCRIPTION "hardware sensors as CIM instances: CMPI providers
 Fans, voltages and temperatures of a computer for WBEM servers (CIM object
 managers): two provider libraries, their classes in MOF, and a command that
@@ -43,12 +45,15 @@ list(TRANSFORM CPACK_DEBIAN_TOOL_PACKAGE_CONTROL_EXTRA PREPEND "${CMAKE_CURRENT_
 foreach(component IN ITEMS provider tool)
   string(TOUPPER ${component} name)
   set(folder doc/${CPACK_DEBIAN_${name}_PACKAGE_NAME})
-  install(FILES debian/copyright
-    DESTINATION "${CMAKE_INSTALL_DATADIR}/${folder}" COMPONENT ${component})
-  install_compressed(FILE debian/changelog AS changelog.Debian
-    FOLDER ${folder} COMPONENT ${component})
-  install_compressed(FILE "${PROJECT_SOURCE_DIR}/CHANGELOG.md" AS changelog
-    FOLDER ${folder} COMPONENT ${component})
+  install(FILES debian/copyright DESTINATION "${CMAKE_INSTALL_DATADIR}/${folder}"
+    COMPONENT ${component}-debian EXCLUDE_FROM_ALL)
+  install_compressed(FILE debian/changelog AS changelog.Debian FOLDER ${folder}
+    COMPONENT ${component}-debian ON_DEMAND)
 endforeach()
 
 include(CPack)
+foreach(component IN ITEMS provider tool)
+  cpack_add_component_group(${component})
+  cpack_add_component(${component} GROUP ${component})
+  cpack_add_component(${component}-debian GROUP ${component})
+endforeach()
