@@ -10,6 +10,7 @@
 
 namespace {
 
+using testing::AllOf;
 using testing::HasSubstr;
 using testing::Not;
 using namespace Testing;
@@ -60,6 +61,20 @@ TEST_F(Packages, dependOnWhatTheyLoad)
             "sensor-profile-provider (= " + field("sensor-profile-provider", "Version") + ")"));
 }
 
+// What Debian wants of each package, and a plain installation does not have.
+TEST_F(Packages, saySomethingOfThemselves)
+{
+    for (const std::string package : {"sensor-profile", "sensor-profile-provider"}) {
+        const std::string documents = " ./usr/share/doc/" + package + "/";
+        EXPECT_THAT(outputOf("dpkg-deb --contents '" + folder().path().string() + "/" + package +
+                             "_'*.deb"),
+            AllOf(HasSubstr(documents + "copyright\n"), HasSubstr(documents + "changelog.gz\n"),
+                HasSubstr(documents + "changelog.Debian.gz\n"),
+                Not(HasSubstr(documents + "LICENSE"))));
+        EXPECT_EQ(field(package, "Section"), "admin");
+    }
+}
+
 TEST_F(Packages, haveTheVersionOfTheirLogOfChanges)
 {
     const std::string log = contentOf(packaging + "debian/changelog");
@@ -76,7 +91,8 @@ TEST(Scripts, areFreeOfWarnings)
     const std::string complaints = outputOf(
         "cd '" SENSOR_PROFILE_SOURCE_DIR "' && "
         "grep -rlE --exclude-dir=build --exclude-dir=.git '^#!/(usr/)?bin/(env bash|sh)' . | "
-        "xargs shellcheck scripts/packages.sh packaging/sensorctl.bash packaging/register/*.sh 2>&1 && echo passed");
+        "xargs shellcheck scripts/packages.sh packaging/sensorctl.bash packaging/register/*.sh "
+        "2>&1 && echo passed");
     EXPECT_EQ(complaints, "passed\n");
 }
 
