@@ -121,20 +121,27 @@ TEST(ManualOfTheModel, hasTheMembersOfTheSchema)
         EXPECT_THAT(page, HasSubstr(name));
 }
 
+// What a sensor with a status of the model file shows.
+nlohmann::json shownWith(unsigned status)
+{
+    const TemporaryFolder files;
+    const std::string model = files.write("model.json",
+        R"({"nodes": [{"type": "voltage", "path": "/1", "description": "S", "status": )" +
+            std::to_string(status) + "}]}");
+    const auto document = nlohmann::json::parse(run({"list", "--json", "--model", model}).out);
+    return document["instances"][0]["properties"];
+}
+
 // Each state's row in the table, against what a sensor with such a status shows.
 TEST(ManualOfTheClasses, hasTheStatesThatSensorsShow)
 {
     const std::map<unsigned, std::string> rows = {{1, "normal"}, {12, "offline"}, {13, "faulty"},
         {16, "switched off"}, {20, "failure foreseen"}, {21, "in alarm"}, {22, "at or below min"},
-        {23, "at or above max"}, {25, "at or below lcrit"}, {26, "at or above crit"}};
+        {23, "at or above max"}, {24, "beyond some limit"}, {25, "at or below lcrit"},
+        {26, "at or above crit"}};
     const std::string page = rendered("sensor-profile.7");
-    const TemporaryFolder files;
     for (const auto& [status, row] : rows) {
-        const std::string model = files.write("model.json",
-            R"({"nodes": [{"type": "voltage", "path": "/1", "description": "S", "status": )" +
-                std::to_string(status) + "}]}");
-        const auto document = nlohmann::json::parse(run({"list", "--json", "--model", model}).out);
-        const auto& shown = document["instances"][0]["properties"];
+        const auto shown = shownWith(status);
         const std::regex line("\n *" + row + "[^\n]* " + shown["CurrentState"].get<std::string>() +
                               " +" + shown["EnabledState"].dump() + " +" +
                               shown["HealthState"].dump() + " +" +
@@ -142,6 +149,52 @@ TEST(ManualOfTheClasses, hasTheStatesThatSensorsShow)
         EXPECT_TRUE(std::regex_search(page, line)) << row << ": " << shown.dump();
         EXPECT_EQ(shown["Status"], shown["HealthState"] == 5 ? "OK" : "Error");
     }
+}
+
+// The same on the operations page, whose rows may be for several states.
+TEST(OperationsPage, hasTheStatesThatSensorsShow)
+{
+    const std::map<unsigned, std::string> rows = {{0, "has no status"}, {1, "is within its limits"},
+        {2, "starts"}, {3, "starts"}, {8, "is dormant"}, {9, "has a status that means nothing"},
+        {10, "starts"}, {12, "is offline"}, {13, "is faulty"}, {16, "is switched off"},
+        {17, "has no contact"}, {20, "will fail soon"}, {21, "is in an alarm"},
+        {22, "reached a lower or upper limit of the first"},
+        {23, "reached a lower or upper limit of the first"}, {24, "is beyond a limit"},
+        {25, "reached a limit of the second"}, {26, "reached a limit of the second"}};
+    const std::string page = contentOf(SENSOR_PROFILE_SOURCE_DIR "/docs/operations.md");
+    for (const auto& [status, row] : rows) {
+        const auto shown = shownWith(status);
+        const std::string state = shown["CurrentState"].get<std::string>();
+        const std::string operational = shown["OperationalStatus"].empty()
+                                            ? "an empty list"
+                                            : shown["OperationalStatus"][0].dump();
+        const std::regex line("\n\\| " + row + "[^|]*\\|[^|]*" +
+                              (state.empty() ? "empty" : "`" + state + "`") + "[^|]*\\| " +
+                              shown["HealthState"].dump() + " \\|[^|]*\\b" + operational +
+                              "\\b[^|]*\\| " + shown["EnabledState"].dump() + " \\|");
+        EXPECT_TRUE(std::regex_search(page, line)) << status << ": " << shown.dump();
+    }
+}
+
+// Every property that is published has a row there.
+TEST(OperationsPage, tellsOfEveryProperty)
+{
+    const std::string page = contentOf(SENSOR_PROFILE_SOURCE_DIR "/docs/operations.md");
+    const std::string model = SENSOR_PROFILE_SOURCE_DIR "/schema/demo-model.json";
+    std::size_t properties = 0;
+    for (const char* const className : {"ZUMLO_NumericSensor", "ZUMLO_ComputerSystem",
+             "ZUMLO_SensorEnabledLogicalElementCapabilities", "ZUMLO_SensorElementCapabilities",
+             "ZUMLO_SensorSystemDevice"}) {
+        const auto document =
+            nlohmann::json::parse(run({"list", className, "--json", "--model", model}).out);
+        for (const auto& instance : document["instances"])
+            for (const auto& [name, value] : instance["properties"].items()) {
+                ++properties;
+                EXPECT_NE(page.find("`" + name + "`"), std::string::npos)
+                    << className << "." << name;
+            }
+    }
+    EXPECT_GT(properties, 40U);
 }
 
 } // namespace
