@@ -50,18 +50,21 @@ Commands addCommands(CLI::App& tool)
     return commands;
 }
 
-ExitCode refuse(const std::string& reason)
+ExitCode refuse(const CLI::App& tool, const std::string& reason)
 {
-    complain(reason + " (sensorctl --help says what is possible)");
+    std::string command = "sensorctl";
+    for (const CLI::App* const chosen : tool.get_subcommands())
+        command += " " + chosen->get_name();
+    complain(reason + " (" + command + " --help says what is possible)");
     return ExitCode::wrongUsage;
 }
 
-ExitCode runChosen(const Commands& commands, Output& out)
+ExitCode runChosen(const CLI::App& tool, const Commands& commands, Output& out)
 {
     const auto chosen = std::find_if(commands.begin(), commands.end(),
         [](const std::unique_ptr<Command>& command) { return command->isChosen(); });
     if (chosen == commands.end())
-        return refuse("a command is missing");
+        return refuse(tool, "a command is missing");
     const ExitCode code = (*chosen)->run(out);
     out.flush();
     return code;
@@ -92,12 +95,12 @@ ExitCode run(int argc, const char* const* argv)
     } catch (const CLI::CallForVersion& version) {
         return print(out, version.what() + std::string("\n"));
     } catch (const CLI::ParseError& error) {
-        return refuse(error.what());
+        return refuse(tool, error.what());
     }
     try {
-        return runChosen(commands, out);
+        return runChosen(tool, commands, out);
     } catch (const UsageError& error) {
-        return refuse(error.what());
+        return refuse(tool, error.what());
     }
 }
 

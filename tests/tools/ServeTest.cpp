@@ -172,7 +172,8 @@ TEST_F(ServeTest, OptionsThatMakeNoSenseAreWrongUsage)
             {"--grace-period", "0"}, {"--unknown"}, {"positional"}}) {
         const Ended ended = failing(withModel(arguments));
         EXPECT_EQ(ended.code, 2) << arguments[0] << ended.err;
-        EXPECT_THAT(ended.err, StartsWith("sensorctl: "));
+        EXPECT_THAT(ended.err, AllOf(StartsWith("sensorctl: "),
+                                   EndsWith(" (sensorctl serve --help says what is possible)\n")));
     }
 }
 
@@ -180,9 +181,9 @@ TEST_F(ServeTest, HelpTellsTheDefaults)
 {
     const Ended ended = run({"serve", "--help"});
     EXPECT_EQ(ended.code, 0);
-    for (const std::string text : {"--port PORT=5988", "--tls-port PORT=5989",
-             "--max-body BYTES=1048576", "--max-connections N=256", "--idle-timeout SECONDS=60",
-             "--max-enumerations N=64", "--max-depth N=64"})
+    for (const std::string text : {"127.0.0.1", "::1", "--port PORT=5988", "--tls-port PORT=5989",
+             "default: no TLS", "default: anybody", "sensor-profile if there is such a user",
+             "--max-body BYTES=1048576"})
         EXPECT_THAT(ended.out, HasSubstr(text));
 }
 

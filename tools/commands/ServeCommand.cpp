@@ -39,14 +39,17 @@ constexpr const char* serveFooter =
     "Loopback addresses are served without TLS, and with it where there is a\n"
     "certificate. All others need --certificate, --key and --passwords.\n"
     "\n"
-    "The passwords are `user:hash` lines, with the hashes that mkpasswd makes by\n"
-    "yescrypt, bcrypt or sha512crypt. The configuration file has lines of\n"
-    "`name = value`, with the names of the options without dashes.\n"
+    "A password file has a line `user:hash` for each user; `mkpasswd` makes the hash,\n"
+    "by yescrypt, bcrypt or sha512crypt. A configuration file has lines of\n"
+    "`name = value`, with the names of the options without the dashes before them,\n"
+    "such as `max-body = 65536`.\n"
     "\n"
     "SIGTERM and SIGINT let requests that run come to their end; a second one does\n"
     "not. SIGHUP reads the certificate, the key and the passwords again, as the user\n"
-    "that the server runs as. The log goes to standard error where RYNLOG_LOG says\n"
-    "nothing else.";
+    "that the server runs as.\n"
+    "\n"
+    "The log goes to standard error, or where RYNLOG_LOG says: syslog, file:PATH or\n"
+    "off. The server does not start where it cannot be written.";
 
 // The libraries of the providers have a log of their own, which follows the environment.
 void logToStandardError()

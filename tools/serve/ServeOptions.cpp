@@ -8,12 +8,13 @@
 #include <CLI/CLI.hpp>
 
 #include <cstdint>
+#include <functional>
 
 namespace Tools {
 
 namespace {
 
-constexpr const char* limitsGroup = "Limits";
+constexpr const char* limitsGroup = "Limits, with their defaults";
 
 void addFile(CLI::App& parser, const char* name, std::optional<std::string>& file,
     const std::string& description)
@@ -21,85 +22,110 @@ void addFile(CLI::App& parser, const char* name, std::optional<std::string>& fil
     parser.add_option(name, file, description)->type_name("FILE");
 }
 
-template <typename Number>
-void addCount(CLI::App& parser, const char* name, Number& value, std::uint64_t least,
-    std::uint64_t most, const char* description, const char* unit = "N")
+struct Bounds {
+    std::uint64_t least;
+    std::uint64_t most;
+};
+
+constexpr std::uint64_t many = 100'000;
+constexpr std::uint64_t veryMany = 100'000'000;
+constexpr std::uint64_t aDay = 86'400; // in seconds
+
+CLI::Option* addNumber(CLI::App& parser, const char* name, std::uint64_t value, Bounds bounds,
+    const char* unit, const char* description, const std::function<void(std::uint64_t)>& set)
 {
-    parser
-        .add_option_function<std::uint64_t>(
-            name, [&value](std::uint64_t given) { value = static_cast<Number>(given); },
-            description)
+    return parser.add_option_function<std::uint64_t>(name, set, description)
         ->default_str(std::to_string(value))
         ->type_name(unit)
-        ->check(CLI::Range(least, most).description(""))
+        ->check(CLI::Range(bounds.least, bounds.most).description(""));
+}
+
+template <typename Number>
+void addCount(CLI::App& parser, const char* name, Number& value, Bounds bounds,
+    const char* description, const char* unit = "N")
+{
+    addNumber(parser, name, value, bounds, unit, description, [&value](std::uint64_t given) {
+        value = static_cast<Number>(given);
+    })->group(limitsGroup);
+}
+
+template <typename Duration>
+void addTime(CLI::App& parser, const char* name, Duration& value, std::uint64_t most,
+    const char* description, const char* unit = "SECONDS")
+{
+    addNumber(parser, name, static_cast<std::uint64_t>(value.count()), {1, most}, unit, description,
+        [&value](std::uint64_t given) { value = Duration(given); })
         ->group(limitsGroup);
 }
 
-void addSeconds(
-    CLI::App& parser, const char* name, std::chrono::seconds& value, const char* description)
+void addPort(CLI::App& parser, const char* name, std::uint16_t& value, const char* description)
 {
-    constexpr std::uint64_t aDay = 86'400;
-    parser
-        .add_option_function<std::uint64_t>(
-            name, [&value](std::uint64_t given) { value = std::chrono::seconds(given); },
-            description)
-        ->default_str(std::to_string(value.count()))
-        ->type_name("SECONDS")
-        ->check(CLI::Range(std::uint64_t{1}, aDay).description(""))
-        ->group(limitsGroup);
+    addNumber(parser, name, value, {0, 65'535}, "PORT", description,
+        [&value](std::uint64_t given) { value = static_cast<std::uint16_t>(given); });
 }
 
 void addPlaces(CLI::App& parser, Host::Http::ListenWishes& listen)
 {
     parser
-        .add_option(
-            "--address", listen.addresses, "Listen there; may be repeated (127.0.0.1 and ::1)")
+        .add_option("--address", listen.addresses,
+            "Listen there; may be repeated (default: 127.0.0.1 and,\n"
+            "where the machine has it, ::1)")
         ->type_name("ADDRESS")
         ->allow_extra_args(false)
         ->multi_option_policy(CLI::MultiOptionPolicy::TakeAll);
-    parser.add_option("--port", listen.port, "Without TLS, on loopback addresses; 0 is any")
-        ->type_name("PORT")
-        ->capture_default_str();
-    parser.add_option("--tls-port", listen.tlsPort, "With TLS; 0 is any")
-        ->type_name("PORT")
-        ->capture_default_str();
+    addPort(parser, "--port", listen.port,
+        "Port without TLS, on loopback addresses only; 0 is any\n"
+        "that is free");
+    addPort(parser, "--tls-port", listen.tlsPort, "Port with TLS; 0 is any that is free");
 }
 
 void addHttpLimits(CLI::App& parser, Host::Http::Limits& limits)
 {
     constexpr std::uint64_t aGigabyte = std::uint64_t{1} << 30;
     constexpr std::uint64_t aMegabyte = std::uint64_t{1} << 20;
-    constexpr std::uint64_t many = 100'000;
-    addCount(parser, "--max-body", limits.maximumBody, 1024, aGigabyte, "Of a request", "BYTES");
-    addCount(parser, "--max-header", limits.maximumHeader, 1024, aMegabyte,
-        "Of a request's first line and header fields", "BYTES");
     addCount(
-        parser, "--max-depth", limits.maximumDepth, 16, 1024, "Of XML elements in one another");
-    addCount(parser, "--max-connections", limits.maximumConnections, 1, many, "In all");
-    addCount(parser, "--max-connections-per-address", limits.maximumConnectionsPerAddress, 1, many,
-        "From one client's address");
-    addCount(parser, "--workers", limits.workers, 1, 256, "Operations that run at a time");
-    addCount(parser, "--max-queue", limits.maximumQueue, 1, many, "Operations that wait");
-    addSeconds(parser, "--idle-timeout", limits.idleTimeout, "A client may be silent so long");
-    addSeconds(parser, "--request-timeout", limits.requestTimeout, "A request must come within");
-    addSeconds(
-        parser, "--answer-timeout", limits.answerTimeout, "An answer must be fetched within");
+        parser, "--max-body", limits.maximumBody, {1024, aGigabyte}, "Size of a request", "BYTES");
+    addCount(parser, "--max-header", limits.maximumHeader, {1024, aMegabyte},
+        "Size of a request's first line and header fields", "BYTES");
+    addCount(parser, "--max-depth", limits.maximumDepth, {16, 1024},
+        "XML elements in one another in a request");
+    addCount(parser, "--max-connections", limits.maximumConnections, {1, many},
+        "Connections at a time, of all clients");
+    addCount(parser, "--max-connections-per-address", limits.maximumConnectionsPerAddress,
+        {1, many},
+        "Connections at a time from one address; an IPv6 network\n"
+        "(/64) counts as one");
+    addCount(
+        parser, "--workers", limits.workers, {1, 256}, "Requests that are worked on at a time");
+    addCount(parser, "--max-queue", limits.maximumQueue, {1, many},
+        "Requests that wait for that; those beyond are refused");
+    addCount(parser, "--max-unsent-objects", limits.maximumUnsentObjects, {1, veryMany},
+        "Objects in answers that clients have yet to fetch, in all");
+    addTime(parser, "--idle-timeout", limits.idleTimeout, aDay,
+        "A connection on which nothing moves is closed after");
+    addTime(parser, "--request-timeout", limits.requestTimeout, aDay,
+        "A request must have come within");
+    addTime(parser, "--answer-timeout", limits.answerTimeout, aDay,
+        "An answer must have been fetched within");
+    addTime(parser, "--sign-in-delay", limits.signInDelay, 10'000,
+        "What a wrong password costs; twice as much after each\n"
+        "further one, up to 32 times",
+        "MILLISECONDS");
 }
 
 void addOperationLimits(CLI::App& parser, Host::OperationLimits& limits)
 {
-    constexpr std::uint64_t many = 100'000;
-    constexpr std::uint64_t veryMany = 100'000'000;
-    addCount(parser, "--max-enumerations", limits.maximumOpenEnumerations, 1, many,
-        "Open at a time, of all clients");
-    addCount(parser, "--max-held-objects", limits.maximumHeldObjects, 1, veryMany,
-        "In open enumerations");
-    addCount(parser, "--max-pull", limits.maximumObjectCount, 1, veryMany,
+    addCount(parser, "--max-enumerations", limits.maximumOpenEnumerations, {1, many},
+        "Enumerations open at a time, of all clients");
+    addCount(parser, "--max-held-objects", limits.maximumHeldObjects, {1, veryMany},
+        "Objects kept for open enumerations, in all");
+    addCount(parser, "--max-pull", limits.maximumObjectCount, {1, veryMany},
         "Objects in one answer to a pull");
-    addSeconds(parser, "--enumeration-timeout", limits.defaultTimeout,
-        "An enumeration that nobody pulls stays so long");
-    addSeconds(parser, "--max-enumeration-timeout", limits.maximumTimeout,
-        "The longest that a client may ask for");
+    addTime(parser, "--enumeration-timeout", limits.defaultTimeout, aDay,
+        "An enumeration that nobody pulls is closed after, unless\n"
+        "its client asks for another time");
+    addTime(parser, "--max-enumeration-timeout", limits.maximumTimeout, aDay,
+        "The longest time that a client may ask for");
 }
 
 } // namespace
@@ -107,16 +133,25 @@ void addOperationLimits(CLI::App& parser, Host::OperationLimits& limits)
 void ServeOptions::addTo(CLI::App& parser)
 {
     addPlaces(parser, listen);
-    addFile(parser, "--certificate", certificate, "Serve TLS with this certificate (PEM)");
-    addFile(parser, "--key", key, "The certificate's private key (PEM)");
-    addFile(parser, "--passwords", passwords, "Clients must sign in as one of these users");
-    parser.add_option("--user", user, "As root: serve as this user (sensor-profile or nobody)")
+    addFile(parser, "--certificate", certificate,
+        "Serve TLS, with this certificate in PEM form\n"
+        "(default: no TLS)");
+    addFile(parser, "--key", key, "The certificate's private key in PEM form");
+    addFile(parser, "--passwords", passwords,
+        "Clients must sign in as one of these users\n"
+        "(default: anybody may ask)");
+    parser
+        .add_option("--user", user,
+            "When started by root: serve as this user (default:\n"
+            "sensor-profile if there is such a user, else nobody)")
         ->type_name("NAME");
-    addFile(parser, "--config", configuration, "Options from a file, for those not given here");
+    addFile(parser, "--config", configuration,
+        "Take options from this file, but for those typed here\n"
+        "(default: none)");
     addHttpLimits(parser, http);
     addOperationLimits(parser, operations);
-    addSeconds(parser, "--grace-period", gracePeriod,
-        "Requests that run have so long when the server ends");
+    addTime(parser, "--grace-period", gracePeriod, aDay,
+        "When the server ends, requests that run have so long");
 }
 
 void ServeOptions::complete(CLI::App& parser)

@@ -1,0 +1,158 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// Every limit of the server as an option and as a setting: its name, its default and its bounds.
+
+#include "tools/serve/ServeOptions.h"
+#include "tests/support/TemporaryFolder.h"
+
+#include <CLI/CLI.hpp>
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+#include <cstdint>
+#include <string>
+#include <vector>
+
+namespace ServeOptionsTests {
+
+using Values = std::vector<std::uint64_t>;
+
+struct Limit {
+    std::string name;
+    std::uint64_t byDefault;
+    std::uint64_t least;
+    std::uint64_t most;
+};
+
+constexpr std::uint64_t many = 100'000;
+constexpr std::uint64_t veryMany = 100'000'000;
+constexpr std::uint64_t aDay = 86'400;
+
+const std::vector<Limit> limits = {{"max-body", 1U << 20U, 1024, 1U << 30U},
+    {"max-header", 16'384, 1024, 1U << 20U}, {"max-depth", 64, 16, 1024},
+    {"max-connections", 256, 1, many}, {"max-connections-per-address", 64, 1, many},
+    {"workers", 4, 1, 256}, {"max-queue", 128, 1, many},
+    {"max-unsent-objects", 200'000, 1, veryMany}, {"idle-timeout", 60, 1, aDay},
+    {"request-timeout", 30, 1, aDay}, {"answer-timeout", 600, 1, aDay},
+    {"sign-in-delay", 1000, 1, 10'000}, {"max-enumerations", 64, 1, many},
+    {"max-held-objects", 100'000, 1, veryMany}, {"max-pull", 10'000, 1, veryMany},
+    {"enumeration-timeout", 60, 1, aDay}, {"max-enumeration-timeout", 600, 1, aDay},
+    {"grace-period", 20, 1, aDay}};
+
+template <typename Duration>
+std::uint64_t countOf(Duration duration)
+{
+    return static_cast<std::uint64_t>(duration.count());
+}
+
+// In the order of the limits. A field that is added to a structure does not compile here until it
+// is given its option.
+Values valuesOf(const Tools::ServeOptions& options)
+{
+    const auto& [body, header, depth, connections, connectionsPerAddress, workers, queue, unsent,
+        idle, request, answer, signIn] = options.http;
+    const auto& [enumerations, held, pull, timeout, longestTimeout] = options.operations;
+    return {body, header, depth, connections, connectionsPerAddress, workers, queue, unsent,
+        countOf(idle), countOf(request), countOf(answer), countOf(signIn), enumerations, held, pull,
+        countOf(timeout), countOf(longestTimeout), countOf(options.gracePeriod)};
+}
+
+Values defaults()
+{
+    Values values;
+    for (const Limit& limit : limits)
+        values.push_back(limit.byDefault);
+    return values;
+}
+
+Values with(std::size_t at, std::uint64_t value)
+{
+    Values values = defaults();
+    values[at] = value;
+    return values;
+}
+
+// What the options say after such a command line.
+Values typed(std::vector<std::string> words)
+{
+    CLI::App parser;
+    Tools::ServeOptions options;
+    options.addTo(parser);
+    parser.parse(std::vector<std::string>(words.rbegin(), words.rend()));
+    options.complete(parser);
+    return valuesOf(options);
+}
+
+class ServeOptionsTest : public testing::Test {
+protected:
+    Values configured(const std::string& line) const
+    {
+        return typed({"--config", folder_.write("settings", line + "\n")});
+    }
+
+    // Why the value is none; empty when it is taken.
+    static std::string refusal(const Limit& limit, std::uint64_t value)
+    {
+        try {
+            typed({"--" + limit.name, std::to_string(value)});
+        } catch (const CLI::ParseError& error) {
+            return error.what();
+        }
+        return {};
+    }
+    std::string configuredRefusal(const Limit& limit, std::uint64_t value) const
+    {
+        try {
+            configured(limit.name + " = " + std::to_string(value));
+        } catch (const std::runtime_error& error) {
+            return error.what();
+        }
+        return {};
+    }
+
+    Testing::TemporaryFolder folder_;
+};
+
+TEST_F(ServeOptionsTest, EveryLimitHasItsDefaultAndTellsIt)
+{
+    CLI::App parser;
+    Tools::ServeOptions options;
+    options.addTo(parser);
+    const std::string help = parser.help();
+    EXPECT_EQ(valuesOf(options), defaults());
+    for (const Limit& limit : limits)
+        EXPECT_THAT(help, testing::ContainsRegex("--" + limit.name + " [A-Z]+=" +
+                                                 std::to_string(limit.byDefault) + "[ \n]"));
+}
+
+TEST_F(ServeOptionsTest, EveryLimitIsAnOptionAndASetting)
+{
+    for (std::size_t at = 0; at < limits.size(); ++at)
+        for (const std::uint64_t value : {limits[at].least, limits[at].most}) {
+            const std::string number = std::to_string(value);
+            EXPECT_EQ(typed({"--" + limits[at].name, number}), with(at, value));
+            EXPECT_EQ(configured(limits[at].name + " = " + number), with(at, value));
+        }
+}
+
+TEST_F(ServeOptionsTest, ValuesBeyondTheBoundsAreRefusedNamingThem)
+{
+    for (const Limit& limit : limits)
+        for (const std::uint64_t value : {limit.least - 1, limit.most + 1}) {
+            const std::string reason = "--" + limit.name + ": Value " + std::to_string(value) +
+                                       " not in range " + std::to_string(limit.least) + " to " +
+                                       std::to_string(limit.most);
+            EXPECT_EQ(refusal(limit, value), reason);
+            EXPECT_EQ(configuredRefusal(limit, value),
+                (folder_.path() / "settings").string() + ":1: " + reason);
+        }
+}
+
+TEST_F(ServeOptionsTest, PortsAreBounded)
+{
+    for (const std::string name : {"port", "tls-port"})
+        for (const std::string value : {"65536", "-1", "http"})
+            EXPECT_THROW(typed({"--" + name, value}), CLI::ValidationError) << value;
+}
+
+} // namespace ServeOptionsTests
