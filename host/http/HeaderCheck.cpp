@@ -6,6 +6,7 @@
 #include "host/http/MandatoryExtension.h"
 #include "host/http/MediaType.h"
 
+#include <algorithm>
 #include <charconv>
 #include <string_view>
 #include <system_error>
@@ -16,13 +17,23 @@ namespace {
 
 constexpr std::string_view mismatch = "header-mismatch";
 
-// A blank before the colon, say, makes a name that others may read as one they know.
-void checkNames(const RequestHead& head)
+bool isControl(char c)
 {
-    for (const HeaderField& field : head.fields)
+    return (c >= '\0' && c < ' ' && c != '\t') || c == '\x7F';
+}
+
+// What others may read otherwise: a name with a blank as the same without, a carriage return in
+// a value as its end.
+void checkFields(const RequestHead& head)
+{
+    for (const HeaderField& field : head.fields) {
         if (!isToken(field.name))
             throw HttpError::closing(
                 Status::badRequest, "the name of a header field holds a character it must not");
+        if (std::any_of(field.value.begin(), field.value.end(), isControl))
+            throw HttpError::closing(
+                Status::badRequest, "the header field " + field.name + " holds a control character");
+    }
 }
 
 void checkHost(const RequestHead& head)
@@ -120,7 +131,7 @@ std::string_view nameSpaceIn(std::string_view object)
 
 BodySize bodySizeOf(const RequestHead& head)
 {
-    checkNames(head);
+    checkFields(head);
     BodySize body;
     if (const auto expectation = head.find("Expect")) {
         if (!equalIgnoringCase(*expectation, "100-continue"))

@@ -36,6 +36,8 @@ HttpError::HttpError(unsigned status, const std::string& reason, std::string_vie
 HttpError::HttpError(const CimXml::RequestError& error)
     : HttpError(statusOf(error.outcome()), error.what(), nameOf(error.outcome()))
 {
+    // The body may have ended elsewhere.
+    endsConnection_ = error.outcome() == Outcome::requestNotWellFormed;
 }
 
 HttpError HttpError::closing(

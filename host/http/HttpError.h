@@ -54,7 +54,7 @@ public:
     // Whether the connection is closed behind the answer.
     bool endsConnection() const noexcept { return endsConnection_; }
 
-    // One that ends the connection: where the request ends is not known, or the client shall go.
+    // One that ends the connection: where the request ends is in doubt, or the client shall go.
     static HttpError closing(
         unsigned status, const std::string& reason, std::vector<HeaderField> fields = {});
 

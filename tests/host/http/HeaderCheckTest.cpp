@@ -143,6 +143,15 @@ TEST(HeaderCheckTest, NamesMustBeNames)
     EXPECT_EQ(verdict(with({"x-9!#$%&'*+.^_`|~", "10"})), "ok");
 }
 
+TEST(HeaderCheckTest, ValuesHoldNoControlCharacters)
+{
+    for (const std::string value : {"1\r", "a\rb", "\x01", "a\x7F", "a\nb"})
+        EXPECT_EQ(verdict(with({"X-Other", value})), "400");
+    EXPECT_EQ(verdict(with({"X-Other", std::string("a\0b", 3)})), "400");
+    for (const std::string value : {"a\tb", "", "\xC3\xA4", "\xFF"})
+        EXPECT_EQ(verdict(with({"X-Other", value})), "ok");
+}
+
 TEST(HeaderCheckTest, MustNameTheHostSinceHttpOneOne)
 {
     EXPECT_EQ(verdict(without("Host")), "400");

@@ -75,11 +75,11 @@ TEST_F(RequestTest, ConnectionTakesRequestAfterRequest)
 TEST_F(RequestTest, ErrorsLeaveTheConnectionForFurtherRequests)
 {
     HttpClient client = connect();
-    client.send(post("", "<CIM"));
-    const HttpReply malformed = client.receive();
-    EXPECT_EQ(malformed.status, 400);
-    EXPECT_EQ(malformed.field("cimerror"), "request-not-well-formed");
-    EXPECT_THAT(malformed.body, StartsWith("line 1, byte "));
+    client.send(post("", "<CIM/>"));
+    const HttpReply invalid = client.receive();
+    EXPECT_EQ(invalid.status, 400);
+    EXPECT_EQ(invalid.field("cimerror"), "request-not-loosely-valid");
+    EXPECT_THAT(invalid.body, StartsWith("line 1, byte "));
     client.send(post("", bodyFor("EnumerateClasses", "other")));
     EXPECT_EQ(client.receive().field("cimerror"), "header-mismatch");
     client.send(post("", bodyFor("EnumerateClasses"), "/elsewhere"));

@@ -83,7 +83,7 @@ protected:
     void askBadly()
     {
         HttpClient client = connect();
-        expectAnswer(client, post("", "<CIM"), 400);
+        expectAnswer(client, post("", "<CIM/>"), 400);
         expectAnswer(client, call("Fail"), 500);
         client.send(post().substr(0, 150));
     }

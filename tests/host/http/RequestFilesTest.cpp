@@ -1,0 +1,99 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// Requests in files, hostile ones for the most part, with what is expected to come of them.
+//
+// NAME.request is what a client sends, byte by byte. NAME.expected is all that comes back, without
+// carriage returns and dates, and then a line that says how the connection ended.
+
+#include "tests/host/http/HttpTest.h"
+
+namespace HttpTests {
+
+namespace {
+
+const std::filesystem::path Folder = SENSOR_PROFILE_SOURCE_DIR "/tests/data/http";
+
+std::string contentOf(const std::filesystem::path& file)
+{
+    std::ifstream in(file, std::ios::binary);
+    EXPECT_TRUE(in.is_open()) << file;
+    std::ostringstream content;
+    content << in.rdbuf();
+    return content.str();
+}
+
+std::vector<std::string> requestFiles()
+{
+    std::vector<std::string> names;
+    for (const auto& entry : std::filesystem::directory_iterator(Folder))
+        if (entry.path().extension() == ".request")
+            names.push_back(entry.path().stem().string());
+    std::sort(names.begin(), names.end());
+    return names;
+}
+
+// What the HTTP library refuses by itself, it says in words of its own, some of them twice.
+std::string described(const std::string& answers)
+{
+    const bool isOfLibrary = answers.find("<html>") != std::string::npos;
+    std::istringstream lines(answers);
+    std::string text;
+    for (std::string line; std::getline(lines, line);) {
+        if (line.ends_with('\r'))
+            line.pop_back();
+        if (!line.starts_with("Date: "))
+            text += line + '\n';
+        if (isOfLibrary)
+            return text + "in words of the HTTP library\n";
+    }
+    return text;
+}
+
+// The ways in which a connection ends. Where it stays open, a further request ends it.
+const std::string staysOpen = "-- The connection stays open.\n";
+const std::string isClosed = "-- The connection is closed.\n";
+const std::string isClosedThen = "-- The connection is closed when the client ends sending.\n";
+
+class RequestFilesTest : public HttpTest, public testing::WithParamInterface<std::string> {
+protected:
+    void SetUp() override { start(); }
+    // Whatever came before.
+    void TearDown() override { EXPECT_EQ(ask(post()).status, 200); }
+
+    std::string outcome(const std::string& request, const std::string& expectedEnd) const
+    {
+        HttpClient client = connect();
+        client.send(request + (expectedEnd == staysOpen ? post("Connection: close\r\n") : ""));
+        if (expectedEnd == isClosedThen)
+            client.endSending();
+        std::string answers;
+        while (!client.isClosed())
+            answers += client.receiveSome();
+        if (expectedEnd != staysOpen)
+            return described(answers) + expectedEnd;
+        const std::size_t last = answers.rfind("HTTP/1.1 200 ");
+        const bool isAnswered = answers.ends_with("\r\n\r\n<answer/>") &&
+                                answers.find("\r\nConnection: close\r\n", last) != answers.npos;
+        return described(answers.substr(0, last)) + (isAnswered ? staysOpen : isClosed);
+    }
+};
+
+TEST_P(RequestFilesTest, OutcomeIsTheExpectedOne)
+{
+    const std::string expected = contentOf(Folder / (GetParam() + ".expected"));
+    const std::string end = expected.substr(std::min(expected.rfind("-- "), expected.size()));
+    ASSERT_TRUE(end == staysOpen || end == isClosed || end == isClosedThen) << end;
+    EXPECT_EQ(outcome(contentOf(Folder / (GetParam() + ".request")), end), expected);
+}
+
+INSTANTIATE_TEST_SUITE_P(
+    Files, RequestFilesTest, testing::ValuesIn(requestFiles()), [](const auto& file) {
+        std::string name = file.param;
+        std::replace_if(
+            name.begin(), name.end(), [](char c) { return c == '-' || c == '.'; }, '_');
+        return name;
+    });
+
+} // namespace
+
+} // namespace HttpTests
