@@ -6,6 +6,7 @@
 #include "host/broker/Refusal.h"
 #include "host/broker/Types.h"
 #include "host/cimxml/Literal.h"
+#include "host/cimxml/MessageParts.h"
 #include "host/repository/MofError.h"
 #include "host/repository/Words.h"
 
@@ -63,8 +64,12 @@ const Instance& InstanceReader::instance(
         path = &ObjectPath::make(
             arena, nameSpace, declared == nullptr ? name : std::string_view(declared->name));
     Instance& made = Instance::make(arena, *path, &classes_);
-    for (const Element& each :
-        element.children({"QUALIFIER", "PROPERTY", "PROPERTY.ARRAY", "PROPERTY.REFERENCE"}))
+    const std::vector<Element> parts =
+        element.children({"QUALIFIER", "PROPERTY", "PROPERTY.ARRAY", "PROPERTY.REFERENCE"});
+    if (parts.size() > MaximumUndeclared && declared == nullptr)
+        refuse("more than " + std::to_string(MaximumUndeclared) + " properties of class " +
+               quotation(name) + ", which is not known");
+    for (const Element& each : parts)
         if (!each.is("QUALIFIER"))
             setProperty(made, each, declared, nameSpace);
     return made;

@@ -87,6 +87,16 @@ TEST_F(PathTest, namesTheKeyWhoseValueDoesNotFit)
     EXPECT_THAT(pathRefusal(flag("true", "1", "now")), testing::StartsWith("4 key \"At\": "));
 }
 
+TEST_F(PathTest, boundsTheKeysOfClassesThatAreNotKnown)
+{
+    std::string keys;
+    for (int number = 0; number < 1000; ++number)
+        keys += binding("K" + std::to_string(number), "x");
+    EXPECT_EQ(pathRefusal(instanceName("Other", keys)), "read");
+    EXPECT_EQ(pathRefusal(instanceName("Other", keys + binding("K", "x"))),
+        "4 more than 1000 keys of class \"Other\", which is not known");
+}
+
 TEST_F(PathTest, refusesKeysTheClassDoesNotHave)
 {
     EXPECT_EQ(pathRefusal(instanceName("Thing", binding("Label", "x"))),

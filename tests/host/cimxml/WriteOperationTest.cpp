@@ -66,6 +66,16 @@ TEST_F(WriteOperationTest, readsInstancesOfUnknownClassesByTheirTypes)
         "4 property \"P\": \"x\" is no type of a value");
 }
 
+TEST_F(WriteOperationTest, boundsThePropertiesOfClassesThatAreNotKnown)
+{
+    std::string properties;
+    for (int number = 0; number < 1000; ++number)
+        properties += property("P" + std::to_string(number), "string", "");
+    EXPECT_EQ(refusalOf(create("Other", properties)), "read");
+    EXPECT_EQ(refusalOf(create("Other", properties + property("P", "string", ""))),
+        "4 more than 1000 properties of class \"Other\", which is not known");
+}
+
 TEST_F(WriteOperationTest, namesThePropertyThatIsWrong)
 {
     EXPECT_EQ(refusalOf(create("Thing", property("None", "string", ""))),
