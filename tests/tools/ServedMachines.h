@@ -1,0 +1,97 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// The servers that clients are tried on, one for each machine and each way to it.
+
+#pragma once
+
+#include "tests/support/MountNamespace.h"
+#include "tests/support/TlsClient.h"
+#include "tests/tools/ServerProcess.h"
+#include "tests/tools/ToolTest.h"
+
+#include <nlohmann/json.hpp>
+
+#include <sys/stat.h>
+
+#include <map>
+#include <optional>
+#include <string>
+#include <tuple>
+#include <utility>
+#include <vector>
+
+namespace Testing {
+
+// With a certificate, and for clients that sign in as ann.
+class Encryption {
+public:
+    Encryption()
+    {
+        makeCertificate(file_, "localhost");
+        // ann's is "secret", at the least cost.
+        passwords_ = folder_.write(
+            "passwords", "ann:$2b$04$abcdefghijklmnopqrstuu2r9OfJnfCsdneAXAGHnS4UpFFP8WIrW\n");
+        ::chmod(passwords_.c_str(), 0600);
+    }
+
+    std::vector<std::string> options() const
+    {
+        return {"--certificate", file_ + ".crt", "--key", file_ + ".key", "--passwords", passwords_,
+            "--sign-in-delay", "1"};
+    }
+
+private:
+    TemporaryFolder folder_;
+    std::string file_ = (folder_.path() / "one").string();
+    std::string passwords_;
+};
+
+using Place = std::tuple<std::string, std::string>; // a machine's name and a scheme
+
+// The options that say which machine.
+inline std::vector<std::string> optionsOf(const std::string& machine)
+{
+    if (machine == "demonstration")
+        return {"--model", SENSOR_PROFILE_SOURCE_DIR "/schema/demo-model.json"};
+    return {};
+}
+
+// What all tests share: nothing that a client may do changes it.
+class Machines {
+public:
+    ServerProcess& server(const Place& place)
+    {
+        const auto& [machine, scheme] = place;
+        std::vector<std::string> options = optionsOf(machine);
+        if (options.empty() && !sysfs_)
+            sysfs_.emplace(sysfsTree(machine));
+        if (scheme == "https") {
+            const auto more = encryption_.options();
+            options.insert(options.end(), more.begin(), more.end());
+        }
+        return servers_.try_emplace(place, options).first->second;
+    }
+
+    // The objects of a class as the tool shows them.
+    const nlohmann::json& listed(const std::string& machine, const std::string& name)
+    {
+        nlohmann::json& instances = listed_[{machine, name}];
+        if (instances.is_null()) {
+            std::vector<std::string> arguments = {"list", name, "--json"};
+            const auto options = optionsOf(machine);
+            arguments.insert(arguments.end(), options.begin(), options.end());
+            const Ended ended = run(arguments);
+            EXPECT_EQ(ended.code, 0) << ended.err;
+            instances = nlohmann::json::parse(ended.out).at("instances");
+        }
+        return instances;
+    }
+
+private:
+    Encryption encryption_;
+    std::optional<BoundSysfs> sysfs_;
+    std::map<Place, ServerProcess> servers_;
+    std::map<std::pair<std::string, std::string>, nlohmann::json> listed_;
+};
+
+} // namespace Testing
