@@ -8,10 +8,14 @@ steps_done=()
 # What restores the registration that was found; empty when there was none.
 earlier_command=''
 
+# The words as they can be typed, in quotation marks only where they need them.
 quoted() {
-  local line
-  line=$(printf '%q ' "$@")
-  printf '%s' "${line% }"
+  local word line=()
+  for word; do
+    [[ $word =~ ^[A-Za-z0-9_./=:,+-]+$ ]] || word=${word@Q}
+    line+=("$word")
+  done
+  printf '%s' "${line[*]}"
 }
 
 # command_to ACTION [OPTION]...: the command that does it with the same object manager and folders,

@@ -184,6 +184,7 @@ TEST_F(Sfcb, dryRunCanBeFollowed)
     std::string script = mustRun(planning);
     script = script.substr(0, script.find("This was a dry run"));
     EXPECT_THAT(script, Not(HasSubstr("/tmp.")));
+    EXPECT_THAT(script, testing::StartsWith("sed -e 's|root/cimv2|root/s|' -e '"));
     fs::create_directory(path("own"));
     const Ended followed = run({"-ec", "cd '" + path("own") + "'\n" + script},
         {.program = "/bin/sh",
