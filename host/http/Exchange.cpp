@@ -96,7 +96,7 @@ void Exchange::tryPassword(const Credentials& credentials)
     try {
         // Somebody else at the address may have failed meanwhile.
         const auto now = std::chrono::steady_clock::now();
-        const auto admission = signIns.admission(client_.neighbourhood, now);
+        const auto admission = signIns.admit(client_.neighbourhood, now);
         if (admission > now && !service_.connections.isWindingUp())
             return tryPasswordAt(admission, credentials);
         if (admission > now) {

@@ -13,15 +13,28 @@ SignInDelays::Time SignInDelays::admission(const std::string& address, Time now)
     return found == failures_.end() ? now : std::max(now, found->second.notBefore);
 }
 
+SignInDelays::Time SignInDelays::admit(const std::string& address, Time now)
+{
+    const std::lock_guard lock(mutex_);
+    const auto found = failures_.find(address);
+    if (found == failures_.end() || isOld(found->second, now))
+        return now;
+    Failures& failures = found->second;
+    if (failures.notBefore > now)
+        return failures.notBefore;
+    failures.notBefore = now + delayAfter(failures);
+    return now;
+}
+
 SignInDelays::Time SignInDelays::failed(const std::string& address, Time now)
 {
     const std::lock_guard lock(mutex_);
     if (!failures_.contains(address))
         makeRoom(now);
     Failures& failures = failures_[address];
-    if (failures.count > 0 && now - failures.last > memory)
+    if (failures.count > 0 && isOld(failures, now))
         failures = {};
-    const Duration delay = first_ * (1U << std::min(failures.count, maximumDoublings));
+    const Duration delay = delayAfter(failures);
     ++failures.count;
     failures.last = now;
     failures.notBefore = std::max(failures.notBefore, now + delay);
@@ -38,7 +51,7 @@ void SignInDelays::makeRoom(Time now)
 {
     if (failures_.size() < capacity)
         return;
-    std::erase_if(failures_, [now](const auto& each) { return now - each.second.last > memory; });
+    std::erase_if(failures_, [now](const auto& each) { return isOld(each.second, now); });
     if (failures_.size() >= capacity)
         failures_.erase(std::min_element(
             failures_.begin(), failures_.end(), [](const auto& one, const auto& other) {

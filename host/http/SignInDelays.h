@@ -4,6 +4,7 @@
 
 #pragma once
 
+#include <algorithm>
 #include <chrono>
 #include <cstddef>
 #include <map>
@@ -27,6 +28,9 @@ public:
 
     // When a password from the address may be tried.
     Time admission(const std::string& address, Time now);
+    // The same. Where that is now, and there were failures before, the next one must wait as if
+    // this one had failed already: many at a time are no faster.
+    Time admit(const std::string& address, Time now);
     // Counts a failure; the time when the client may hear of it.
     Time failed(const std::string& address, Time now);
 
@@ -39,6 +43,11 @@ private:
         Time last{};
     };
 
+    static bool isOld(const Failures& failures, Time now) { return now - failures.last > memory; }
+    Duration delayAfter(const Failures& failures) const
+    {
+        return first_ * (1U << std::min(failures.count, maximumDoublings));
+    }
     void makeRoom(Time now);
 
     const Duration first_;

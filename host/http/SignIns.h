@@ -40,6 +40,11 @@ public:
     {
         return delays_.admission(neighbourhood, now);
     }
+    // The same for one that is tried now if it may be.
+    Time admit(const std::string& neighbourhood, Time now)
+    {
+        return delays_.admit(neighbourhood, now);
+    }
     // Takes long. Nothing when the password is right; for a wrong one, which goes to the log with
     // the address, when the client may hear of it. That is counted from now, the beginning, so
     // that it does not tell how long the user's hash took. REQUIRES: areDemanded().

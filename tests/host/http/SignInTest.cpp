@@ -71,6 +71,23 @@ TEST(SignInDelaysTest, GrowWithEachFailureOfAnAddress)
     EXPECT_EQ(delays.failed("a", later), later + 1s);
 }
 
+TEST(SignInDelaysTest, AfterAFailureOneIsTriedAtATime)
+{
+    SignInDelays delays(1s);
+    const SignInDelays::Time start{};
+    EXPECT_EQ(delays.admit("a", start), start);
+    EXPECT_EQ(delays.admit("a", start), start);
+    EXPECT_EQ(delays.failed("a", start), start + 1s);
+    EXPECT_EQ(delays.admit("a", start), start + 1s);
+    EXPECT_EQ(delays.admit("a", start + 1s), start + 1s);
+    EXPECT_EQ(delays.admit("a", start + 1s), start + 3s);
+    EXPECT_EQ(delays.failed("a", start + 1s), start + 3s);
+    EXPECT_EQ(delays.admit("b", start), start);
+    const auto later = start + SignInDelays::memory + 2s;
+    EXPECT_EQ(delays.admit("a", later), later);
+    EXPECT_EQ(delays.admit("a", later), later);
+}
+
 TEST(SignInDelaysTest, AreKeptForSoManyAddressesOnly)
 {
     SignInDelays delays(1s);
@@ -196,6 +213,20 @@ TEST_F(SignInTest, SeveralConnectionsGuessNoFaster)
     limits.signInDelay = 200ms;
     limits.workers = 1;
     start();
+    const auto begin = std::chrono::steady_clock::now();
+    HttpClient one = connect();
+    HttpClient other = connect();
+    one.send(post(wrong));
+    other.send(post(wrong));
+    EXPECT_EQ(one.receive().status, 401);
+    EXPECT_EQ(other.receive().status, 401);
+    EXPECT_GE(std::chrono::steady_clock::now() - begin, 600ms); // 200 and then 400
+}
+
+TEST_F(SignInTest, AfterAFailureConnectionsTakeTurns)
+{
+    start();
+    EXPECT_EQ(ask(post(wrong)).status, 401);
     const auto begin = std::chrono::steady_clock::now();
     HttpClient one = connect();
     HttpClient other = connect();
