@@ -13,6 +13,7 @@
 #include "tools/commands/Commands.h"
 #include "tools/output/Output.h"
 #include "tools/serve/Greeting.h"
+#include "tools/serve/MemoryReturn.h"
 #include "tools/serve/Protection.h"
 #include "tools/serve/ServeOptions.h"
 #include "tools/serve/ServiceManager.h"
@@ -189,7 +190,8 @@ public:
             requireReadable(*source_.model());
 
         const std::string text = greeting(sockets, protection.passwords() != nullptr);
-        Host::Http::Server server(manager, std::move(sockets), options_.http,
+        MemoryReturn operations(manager);
+        Host::Http::Server server(operations, std::move(sockets), options_.http,
             protection.certificate(), protection.passwords());
         out.write(text);
         out.flush();
