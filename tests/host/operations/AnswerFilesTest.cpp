@@ -6,12 +6,14 @@
 // In both @SYSTEM@ stands for the kernel's host name and @CONTEXT@ for the context of the open
 // enumeration. `<!-- after OTHER.xml -->` in a request: the other one is made before it.
 
+#include "host/cimxml/OperationTable.h"
 #include "platform/utilities/ProviderUtilities.h"
 #include "tests/host/operations/ShippedManager.h"
 
 #include <algorithm>
 #include <filesystem>
 #include <fstream>
+#include <map>
 #include <sstream>
 #include <vector>
 
@@ -90,11 +92,14 @@ TEST_P(AnswerFilesTest, theAnswerIsTheExpectedOne)
 INSTANTIATE_TEST_SUITE_P(Files, AnswerFilesTest, testing::ValuesIn(requests()),
     [](const auto& file) { return replaced(file.param, "-", "_"); });
 
-TEST(AnswerFiles, coverEveryOperation)
+TEST(AnswerFiles, coverEveryOperationWithEachOfItsParameters)
 {
-    std::string all;
-    for (const std::string& name : requests())
-        all += contentOf(Folder / (name + ".xml"));
+    using Host::CimXml::Parameter;
+    std::map<std::string, std::string> textsByOperation;
+    for (const std::string& name : requests()) {
+        const std::string text = contentOf(Folder / (name + ".xml"));
+        textsByOperation[between(text, "<IMETHODCALL NAME=\"", "\"")] += text;
+    }
     for (const char* const operation :
         {"GetInstance", "EnumerateInstances", "EnumerateInstanceNames", "CreateInstance",
             "ModifyInstance", "DeleteInstance", "GetProperty", "SetProperty", "ExecQuery",
@@ -102,10 +107,20 @@ TEST(AnswerFiles, coverEveryOperation)
             "EnumerateClasses", "EnumerateClassNames", "GetQualifier", "EnumerateQualifiers",
             "OpenEnumerateInstances", "OpenEnumerateInstancePaths", "OpenAssociatorInstances",
             "OpenAssociatorInstancePaths", "OpenReferenceInstances", "OpenReferenceInstancePaths",
-            "PullInstancesWithPath", "PullInstancePaths", "CloseEnumeration"})
-        EXPECT_NE(
-            all.find("<IMETHODCALL NAME=\"" + std::string(operation) + "\">"), std::string::npos)
-            << operation;
+            "PullInstancesWithPath", "PullInstancePaths", "CloseEnumeration"}) {
+        const std::string& texts = textsByOperation[operation];
+        EXPECT_NE(texts, "") << operation;
+        const auto* const form = Host::CimXml::findOperation(operation);
+        ASSERT_NE(form, nullptr) << operation;
+        for (std::size_t at = 0; at < Host::CimXml::ParameterCount; ++at) {
+            const auto parameter = static_cast<Parameter>(at);
+            const std::string name(nameOf(parameter));
+            if (form->required.has(parameter) || form->optional.has(parameter)) {
+                EXPECT_NE(texts.find("<IPARAMVALUE NAME=\"" + name + "\">"), std::string::npos)
+                    << operation << ' ' << name;
+            }
+        }
+    }
 }
 
 } // namespace
