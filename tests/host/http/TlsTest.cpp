@@ -128,6 +128,20 @@ TEST_F(TlsTest, ClientsThatDoNotFinishTheHandshakeEnd)
     EXPECT_EQ(client.receive().status, 200);
 }
 
+TEST_F(TlsTest, ClientsThatAreTooManyEndBeforeTheHandshake)
+{
+    server.reset();
+    limits.maximumConnections = 1;
+    start({{{"127.0.0.1", 0}, true}});
+    TlsClient client(port);
+    for (int i = 0; i < 3; ++i) {
+        HttpClient refused = connect();
+        EXPECT_TRUE(refused.isClosed());
+        client.send(post());
+        EXPECT_EQ(client.receive().status, 200);
+    }
+}
+
 // Who writes to them would raise a SIGPIPE, which ends a process that does not care for it.
 TEST_F(TlsTest, ClientsThatVanishAmidTheirAnswerDoNoHarm)
 {
