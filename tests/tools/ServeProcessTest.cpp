@@ -221,6 +221,18 @@ TEST_F(ServeProcessTest, RootIsRenouncedWhereOnlyRootCanReadTheTool)
     EXPECT_EQ(server.end(SIGTERM).code, 0);
 }
 
+TEST_F(ServeProcessTest, ModelThatTheUserCannotReadIsTold)
+{
+    if (::geteuid() != 0)
+        GTEST_SKIP() << "only root can renounce root";
+    const Ended ended = run(withModel({"serve", "--port", "0", "--user", "nobody"}),
+        {.environment = {{"ASAN_OPTIONS", "detect_leaks=0"}}});
+    EXPECT_EQ(ended.code, 1);
+    EXPECT_EQ(ended.err, "sensorctl: " + smallModel() +
+                             ", which the server needs as the user it runs as (--user names "
+                             "another): Permission denied\n");
+}
+
 TEST_F(ServeProcessTest, UserThatIsNotThereIsTold)
 {
     const Ended ended = failing(withModel({"--port", "0", "--user", "no-such-user"}));

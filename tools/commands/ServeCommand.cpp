@@ -91,9 +91,9 @@ void requireReadable(const std::string& file)
         reason, file + ", which the server needs as the user it runs as (--user names another)");
 }
 
-// Makes the object manager load the providers, and those the catalogs of their texts, while root
+// Makes the operations load the providers, and those the catalogs of their texts, while root
 // can read them: the user that serves may not.
-void loadProviders(Host::ObjectManager& manager)
+void loadProviders(Host::CimXml::OperationHandler& operations)
 {
     const Host::CimXml::Message message(
         R"(<CIM CIMVERSION="2.0" DTDVERSION="2.0"><MESSAGE ID="1" PROTOCOLVERSION="1.0"><SIMPLEREQ>)"
@@ -102,7 +102,7 @@ void loadProviders(Host::ObjectManager& manager)
         R"(<CLASSNAME NAME="CIM_LogicalElement"/></IPARAMVALUE><IPARAMVALUE NAME="PropertyList">)"
         R"(<VALUE.ARRAY><VALUE>Caption</VALUE></VALUE.ARRAY></IPARAMVALUE></IMETHODCALL></SIMPLEREQ>)"
         R"(</MESSAGE></CIM>)");
-    (void)manager.answer(message, {});
+    (void)operations.answer(message, {});
 }
 
 // A server whose log is lost from the beginning is nothing to rely on. One that loses it later
@@ -183,14 +183,14 @@ public:
         Host::ObjectManager manager(*classes,
             Host::sensorProfileProviders(files.sensors, files.computerSystem),
             Vorn::getSystemName(), options_.operations);
+        MemoryReturn operations(manager);
         if (Host::Http::isRoot() && options_.user != "root")
-            loadProviders(manager);
+            loadProviders(operations);
         beginLog(renounceRoot(options_.user), out);
         if (source_.model())
             requireReadable(*source_.model());
 
         const std::string text = greeting(sockets, protection.passwords() != nullptr);
-        MemoryReturn operations(manager);
         Host::Http::Server server(operations, std::move(sockets), options_.http,
             protection.certificate(), protection.passwords());
         out.write(text);
