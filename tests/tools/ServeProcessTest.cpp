@@ -225,12 +225,18 @@ TEST_F(ServeProcessTest, ModelThatTheUserCannotReadIsTold)
 {
     if (::geteuid() != 0)
         GTEST_SKIP() << "only root can renounce root";
-    const Ended ended = run(withModel({"serve", "--port", "0", "--user", "nobody"}),
-        {.environment = {{"ASAN_OPTIONS", "detect_leaks=0"}}});
-    EXPECT_EQ(ended.code, 1);
-    EXPECT_EQ(ended.err, "sensorctl: " + smallModel() +
-                             ", which the server needs as the user it runs as (--user names "
-                             "another): Permission denied\n");
+    const std::string file = smallModel();
+    for (const std::vector<std::string>& option :
+        {std::vector<std::string>{"--model", file}, std::vector<std::string>{}}) {
+        std::vector<std::string> arguments{"serve", "--port", "0", "--user", "nobody"};
+        arguments.insert(arguments.end(), option.begin(), option.end());
+        const Ended ended = run(arguments, {.environment = {{"ASAN_OPTIONS", "detect_leaks=0"},
+                                                {"VORN_INSTRUMENTATION", "model:" + file}}});
+        EXPECT_EQ(ended.code, 1);
+        EXPECT_EQ(ended.err, "sensorctl: " + file +
+                                 ", which the server needs as the user it runs as (--user names "
+                                 "another): Permission denied\n");
+    }
 }
 
 TEST_F(ServeProcessTest, UserThatIsNotThereIsTold)

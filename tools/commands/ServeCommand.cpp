@@ -6,6 +6,7 @@
 #include "host/http/Server.h"
 #include "host/manager/SensorProfile.h"
 #include "host/operations/ObjectManager.h"
+#include "platform/instrumentation/SourceList.h"
 #include "platform/utilities/ProviderUtilities.h"
 #include "tools/SourceOptions.h"
 #include "tools/UsageError.h"
@@ -29,6 +30,7 @@
 #include <cstdlib>
 #include <stdexcept>
 #include <system_error>
+#include <vector>
 
 namespace Tools {
 
@@ -89,6 +91,19 @@ void requireReadable(const std::string& file)
     const std::error_code reason(errno, std::system_category());
     throw std::system_error(
         reason, file + ", which the server needs as the user it runs as (--user names another)");
+}
+
+// Of the machine that is served, be they given by an option or by the environment.
+std::vector<std::string> modelFiles()
+{
+    std::vector<std::string> files;
+    const char* const sources = ::getenv("VORN_INSTRUMENTATION");
+    if (sources == nullptr || *sources == '\0')
+        return files;
+    for (const Vorn::SourceEntry& entry : Vorn::parseSourceList(sources))
+        if (entry.scheme == "model")
+            files.push_back(entry.argument);
+    return files;
 }
 
 // Makes the operations load the providers, and those the catalogs of their texts, while root
@@ -187,8 +202,8 @@ public:
         if (Host::Http::isRoot() && options_.user != "root")
             loadProviders(operations);
         beginLog(renounceRoot(options_.user), out);
-        if (source_.model())
-            requireReadable(*source_.model());
+        for (const std::string& file : modelFiles())
+            requireReadable(file);
 
         const std::string text = greeting(sockets, protection.passwords() != nullptr);
         Host::Http::Server server(operations, std::move(sockets), options_.http,
