@@ -14,7 +14,8 @@ namespace Tools {
 
 void SourceOptions::addModel(CLI::App& parser)
 {
-    parser.add_option("--model", model_, "The machine this model file describes")
+    parser
+        .add_option("--model", model_, "The machine this model file describes (default: this one)")
         ->type_name("FILE");
 }
 
