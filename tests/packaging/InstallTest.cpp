@@ -190,9 +190,45 @@ TEST_F(InstalledService, hasThePathsOfItsPrefix)
 // The unit hides homes from the service.
 TEST_F(InstalledService, isNotInstalledWhereItCannotStart)
 {
-    for (const char* const prefix : {"/home/somebody/sensors", "/root/sensors"})
+    for (const char* const prefix : {"/home/somebody/sensors", "/root/sensors", "/root"})
         installFor(prefix);
     EXPECT_THAT(files(), testing::IsEmpty());
+}
+
+// What a unit would have to quote.
+TEST_F(InstalledService, isNotInstalledBelowAnOddPrefix)
+{
+    for (const char* const prefix : {"/srv/our sensors", "/srv/100%", "/srv/$HOME"})
+        installFor(prefix);
+    EXPECT_THAT(files(), testing::IsEmpty());
+    EXPECT_TRUE(fs::exists(folder_.path() / "srv/our sensors/bin/sensorctl"));
+}
+
+TEST_F(InstalledService, hasWholePathsBelowARelativePrefix)
+{
+    const std::string prefix = folder_.path().string() + "/relative";
+    EXPECT_THAT(outputOf("cd '" + folder_.path().string() +
+                         "' && '" SENSOR_PROFILE_CMAKE "' --install '" SENSOR_PROFILE_BINARY_DIR
+                         "' --component tool --prefix relative 2>&1"),
+        HasSubstr("relative/etc/sensor-profile/serve.conf\n"));
+    EXPECT_THAT(content("/relative/lib/systemd/system/sensor-profile.service"),
+        HasSubstr("\nExecStart=" + prefix + "/bin/sensorctl serve --config " + prefix +
+                  "/etc/sensor-profile/serve.conf\n"));
+}
+
+// Several can install from one build at the same time, and others than its owner can.
+TEST_F(InstalledService, isNotMadeInTheBuild)
+{
+    const auto inTheBuild = [] {
+        std::map<std::string, fs::file_time_type> times;
+        const fs::path build = SENSOR_PROFILE_BINARY_DIR "/packaging";
+        for (const std::string& file : filesBelow(build))
+            times[file] = fs::last_write_time(build / file);
+        return times;
+    };
+    const auto before = inTheBuild();
+    installFor("/srv/sensors");
+    EXPECT_EQ(inTheBuild(), before);
 }
 
 TEST_F(InstalledService, seesTheTemporaryFolderThatItIsTriedIn)
@@ -202,12 +238,25 @@ TEST_F(InstalledService, seesTheTemporaryFolderThatItIsTriedIn)
         HasSubstr("\nPrivateTmp=no\n"));
 }
 
+// By a script of its own: the build's list is that of whichever installation was the last.
 TEST_F(InstalledService, isInTheListOfWhatIsInstalled)
 {
-    installFor("/usr");
-    const auto listed = linesOf(contentOf(SENSOR_PROFILE_BINARY_DIR "/install_manifest_tool.txt"));
-    for (const std::string& file : files())
-        EXPECT_THAT(listed, testing::Contains(file));
+    const std::string script = folder_.write("script.cmake",
+        "include(\"" SENSOR_PROFILE_BINARY_DIR "/packaging/cmake_install.cmake\")\n"
+        "file(WRITE \"" +
+            folder_.path().string() + "/list\" \"${CMAKE_INSTALL_MANIFEST_FILES}\")");
+    const TemporaryFolder root;
+    const Ended ended =
+        run({"-DCMAKE_INSTALL_PREFIX=/usr", "-DCMAKE_INSTALL_COMPONENT=tool", "-P", script},
+            {.program = SENSOR_PROFILE_CMAKE, .environment = {{"DESTDIR", root.path().string()}}});
+    ASSERT_EQ(ended.code, 0) << ended.err;
+    std::string list = contentOf(folder_.path().string() + "/list");
+    std::replace(list.begin(), list.end(), ';', '\n');
+    std::vector<std::string> installed;
+    for (const std::string& file : filesBelow(root.path()))
+        installed.push_back("/" + file);
+    EXPECT_THAT(linesOf(list), testing::UnorderedElementsAreArray(installed));
+    EXPECT_THAT(installed, testing::Contains("/lib/systemd/system/sensor-profile.service"));
 }
 
 TEST_F(InstalledService, hasAUnitThatSystemdUnderstands)
