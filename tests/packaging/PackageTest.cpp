@@ -19,11 +19,13 @@ const std::string packaging = SENSOR_PROFILE_SOURCE_DIR "/packaging/";
 
 class Packages : public testing::Test {
 protected:
+    // Made by somebody who is cautious.
     static void SetUpTestSuite()
     {
-        const Ended ended = run({"--config", SENSOR_PROFILE_BINARY_DIR "/CPackConfig.cmake", "-B",
-                                    folder().path().string()},
-            {.program = SENSOR_PROFILE_CPACK});
+        const Ended ended =
+            run({"-c", "umask 077 && exec \"$@\"", "sh", SENSOR_PROFILE_CPACK, "--config",
+                    SENSOR_PROFILE_BINARY_DIR "/CPackConfig.cmake", "-B", folder().path().string()},
+                {.program = "/bin/sh"});
         ASSERT_EQ(ended.code, 0) << ended.out << ended.err;
     }
 
@@ -59,6 +61,17 @@ TEST_F(Packages, dependOnWhatTheyLoad)
     EXPECT_THAT(field("sensor-profile", "Depends"),
         HasSubstr(
             "sensor-profile-provider (= " + field("sensor-profile-provider", "Version") + ")"));
+}
+
+TEST_F(Packages, canBeReadByEverybody)
+{
+    for (const char* const package : {"sensor-profile", "sensor-profile-provider"}) {
+        const auto entries = linesOf(outputOf(
+            "dpkg-deb --contents '" + folder().path().string() + "/" + package + "_'*.deb"));
+        EXPECT_GT(entries.size(), 10U);
+        for (const std::string& entry : entries)
+            EXPECT_THAT(entry, testing::ContainsRegex("^(drwxr-xr-x|-rw[x-]r-[x-]r-[x-]) "));
+    }
 }
 
 // What Debian wants of each package, and a plain installation does not have.

@@ -1,0 +1,9 @@
+# Lets everybody enter and read the folders of what is about to be packed. Run by cpack.
+
+file(GLOB_RECURSE entries LIST_DIRECTORIES true "${CPACK_TEMPORARY_DIRECTORY}/*")
+foreach(entry IN LISTS entries)
+  if(IS_DIRECTORY "${entry}" AND NOT IS_SYMLINK "${entry}")
+    file(CHMOD "${entry}" DIRECTORY_PERMISSIONS
+      OWNER_READ OWNER_WRITE OWNER_EXECUTE GROUP_READ GROUP_EXECUTE WORLD_READ WORLD_EXECUTE)
+  endif()
+endforeach()
