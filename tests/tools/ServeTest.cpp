@@ -239,19 +239,29 @@ TEST_F(ServeTest, MistakesInTheConfigurationFileAreNamedWithTheirLine)
     const auto problem = [&](const std::string& line) {
         const Ended ended =
             failing({"--config", folder_.write("serve.conf", "# first\n" + line + "\n")});
-        EXPECT_EQ(ended.code, 1) << line;
+        EXPECT_EQ(ended.code, 2) << line; // the unit does not restart it then
         const std::size_t begin = ended.err.find("serve.conf");
-        return begin == std::string::npos ? ended.err : ended.err.substr(begin);
+        const std::size_t advice = ended.err.find(" (sensorctl serve --help says what");
+        return begin == std::string::npos ? ended.err : ended.err.substr(begin, advice - begin);
     };
-    EXPECT_EQ(problem("prot = 1"), "serve.conf:2: there is no setting \"prot\"\n");
-    EXPECT_EQ(problem("config = x"), "serve.conf:2: there is no setting \"config\"\n");
-    EXPECT_EQ(problem("help = 1"), "serve.conf:2: there is no setting \"help\"\n");
-    EXPECT_EQ(problem("port"), "serve.conf:2: it is no `name = value`\n");
-    EXPECT_EQ(problem("port ="), "serve.conf:2: port has no value\n");
-    EXPECT_EQ(problem("port = 1\nport = 2"), "serve.conf:3: a second line for port\n");
+    EXPECT_EQ(problem("prot = 1"), "serve.conf:2: there is no setting \"prot\"");
+    EXPECT_EQ(problem("config = x"), "serve.conf:2: there is no setting \"config\"");
+    EXPECT_EQ(problem("help = 1"), "serve.conf:2: there is no setting \"help\"");
+    EXPECT_EQ(problem("port"), "serve.conf:2: it is no `name = value`");
+    EXPECT_EQ(problem("port ="), "serve.conf:2: port has no value");
+    EXPECT_EQ(problem("port = 1\nport = 2"), "serve.conf:3: a second line for port");
     EXPECT_THAT(problem("port = many"), StartsWith("serve.conf:2: "));
     EXPECT_THAT(problem("workers = 0"), StartsWith("serve.conf:2: "));
-    EXPECT_THAT(failing({"--config", "/none"}).err, HasSubstr("/none: No such file"));
+}
+
+TEST_F(ServeTest, ConfigurationFileThatCannotBeReadIsAFailure)
+{
+    for (const auto& [file, reason] : std::map<std::string, std::string>{
+             {"/none", "/none: No such file"}, {"/", "/: it cannot be read"}}) {
+        const Ended ended = failing({"--config", file});
+        EXPECT_EQ(ended.code, 1);
+        EXPECT_THAT(ended.err, HasSubstr(reason));
+    }
 }
 
 } // namespace

@@ -2,6 +2,8 @@
 
 #include "tools/serve/ConfigurationFile.h"
 
+#include "tools/UsageError.h"
+
 #include <CLI/CLI.hpp>
 
 #include <cerrno>
@@ -33,22 +35,22 @@ class Reader {
 public:
     explicit Reader(CLI::App& parser) : parser_(parser) {}
 
-    // Throws std::runtime_error with the reason alone.
+    // Throws UsageError with the reason alone.
     void take(std::string_view line)
     {
         const std::size_t equals = line.find('=');
         if (equals == std::string_view::npos)
-            throw std::runtime_error("it is no `name = value`");
+            throw UsageError("it is no `name = value`");
         const std::string name(trimmed(line.substr(0, equals)));
         const std::string value(trimmed(line.substr(equals + 1)));
         CLI::Option& option = find(name);
         if (value.empty())
-            throw std::runtime_error(name + " has no value");
+            throw UsageError(name + " has no value");
         const bool isFirst = !seen_.contains(&option);
         if (isFirst)
             seen_.emplace(&option, option.count() > 0);
         else if (option.get_multi_option_policy() != CLI::MultiOptionPolicy::TakeAll)
-            throw std::runtime_error("a second line for " + name);
+            throw UsageError("a second line for " + name);
         if (!seen_.at(&option))
             set(option, value, isFirst);
     }
@@ -60,7 +62,7 @@ private:
                                         ? nullptr
                                         : parser_.get_option_no_throw("--" + name);
         if (option == nullptr)
-            throw std::runtime_error("there is no setting \"" + name + "\"");
+            throw UsageError("there is no setting \"" + name + "\"");
         return *option;
     }
 
@@ -72,7 +74,7 @@ private:
             option.add_result(value);
             option.run_callback();
         } catch (const CLI::ParseError& error) {
-            throw std::runtime_error(error.what());
+            throw UsageError(error.what());
         }
     }
 
@@ -95,8 +97,8 @@ void applyConfigurationFile(CLI::App& parser, const std::string& file)
             continue;
         try {
             reader.take(text);
-        } catch (const std::runtime_error& error) {
-            throw std::runtime_error(file + ":" + std::to_string(number) + ": " + error.what());
+        } catch (const UsageError& error) {
+            throw UsageError(file + ":" + std::to_string(number) + ": " + error.what());
         }
     }
     if (in.bad())

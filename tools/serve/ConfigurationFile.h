@@ -14,8 +14,8 @@ namespace Tools {
 
 // Gives the parser's options what the file says, as if it had been typed; what was typed counts
 // instead where it was. Empty lines and those that begin with # count for nothing. An option that
-// may be typed several times may have several lines. Throws std::runtime_error with file, line
-// and reason for any other line that makes no sense.
+// may be typed several times may have several lines. Throws UsageError with file, line and reason
+// for any other line that makes no sense, std::runtime_error when the file cannot be read.
 void applyConfigurationFile(CLI::App& parser, const std::string& file);
 
 } // namespace Tools

@@ -33,8 +33,8 @@ struct ServeOptions {
     void addTo(CLI::App& parser);
 
     // To be called when the command line was read: reads the configuration file where there is
-    // one. Throws std::runtime_error for a mistake in it, and UsageError for options that do not
-    // go together.
+    // one. Throws UsageError for a mistake in it and for options that do not go together, and
+    // std::runtime_error when it cannot be read.
     void complete(CLI::App& parser);
 };
 
