@@ -13,6 +13,7 @@
 #include "host/broker/Request.h"
 #include "host/broker/Result.h"
 #include "tests/providers/Factories.h"
+#include "tests/support/CimCall.h"
 #include "tests/support/HttpClient.h"
 
 #include <algorithm>
@@ -37,35 +38,16 @@ using Durations = std::vector<double>; // in milliseconds
 
 constexpr const char* Class = "ZUMLO_NumericSensor";
 
-std::string call(const std::string& method, const std::string& parameter)
-{
-    const std::string body =
-        R"(<?xml version="1.0" encoding="utf-8"?><CIM CIMVERSION="2.0" DTDVERSION="2.0">)"
-        R"(<MESSAGE ID="1" PROTOCOLVERSION="1.0"><SIMPLEREQ><IMETHODCALL NAME=")" +
-        method +
-        R"("><LOCALNAMESPACEPATH><NAMESPACE NAME="root"/><NAMESPACE NAME="cimv2"/>)"
-        R"(</LOCALNAMESPACEPATH>)" +
-        parameter + "</IMETHODCALL></SIMPLEREQ></MESSAGE></CIM>";
-    return "POST /cimom HTTP/1.1\r\nHost: localhost\r\nContent-Type: application/xml\r\n"
-           "CIMOperation: MethodCall\r\nCIMMethod: " +
-           method + "\r\nCIMObject: root/cimv2\r\nContent-Length: " + std::to_string(body.size()) +
-           "\r\n\r\n" + body;
-}
-
 std::string enumerateInstances()
 {
-    return call("EnumerateInstances",
-        R"(<IPARAMVALUE NAME="ClassName"><CLASSNAME NAME="ZUMLO_NumericSensor"/></IPARAMVALUE>)");
+    return Testing::cimRequest("EnumerateInstances", Testing::cimClassParameter(Class));
 }
 
 std::string getInstance(std::int64_t sensors)
 {
-    const auto key = [](const std::string& name, const std::string& value) {
-        return "<KEYBINDING NAME=\"" + name + "\"><KEYVALUE>" + value + "</KEYVALUE></KEYBINDING>";
-    };
-    return call("GetInstance",
-        R"(<IPARAMVALUE NAME="InstanceName"><INSTANCENAME CLASSNAME="ZUMLO_NumericSensor">)" +
-            key("DeviceID", ModelMachine::someDeviceID(sensors)) + "</INSTANCENAME></IPARAMVALUE>");
+    return Testing::cimRequest("GetInstance",
+        Testing::cimParameter("InstanceName",
+            Testing::cimInstanceName(Class, {{"DeviceID", ModelMachine::someDeviceID(sensors)}})));
 }
 
 double median(Durations durations)

@@ -1,23 +1,19 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
 #include "tools/serve/MemoryReturn.h"
+
 #include "host/cimxml/Message.h"
+#include "tests/support/CimCall.h"
 
 #include <gtest/gtest.h>
+
+#include <unistd.h>
 
 #include <fstream>
 #include <memory>
 #include <string>
 #include <thread>
 #include <vector>
-
-#include <unistd.h>
-
-#if defined(__has_feature)
-#if __has_feature(address_sanitizer) || __has_feature(thread_sanitizer)
-#define SENSOR_PROFILE_OTHER_MALLOC
-#endif
-#endif
 
 namespace MemoryReturnTests {
 
@@ -72,10 +68,7 @@ std::size_t leftBehindBy(std::size_t objects)
 {
     WastefulHandler handler(objects);
     Tools::MemoryReturn memoryReturn(handler);
-    const Host::CimXml::Message message(
-        R"(<CIM CIMVERSION="2.0" DTDVERSION="2.0"><MESSAGE ID="1" PROTOCOLVERSION="1.0">)"
-        R"(<SIMPLEREQ><IMETHODCALL NAME="EnumerateClassNames"><LOCALNAMESPACEPATH>)"
-        R"(<NAMESPACE NAME="root"/></LOCALNAMESPACEPATH></IMETHODCALL></SIMPLEREQ></MESSAGE></CIM>)");
+    const Host::CimXml::Message message(Testing::cimCall("EnumerateClassNames"));
     const std::size_t before = residentMegabytes();
     auto answer = memoryReturn.answer(message, {});
     EXPECT_EQ(answer->heldObjects(), objects);
@@ -86,17 +79,11 @@ std::size_t leftBehindBy(std::size_t objects)
 
 TEST(MemoryReturn, WhatLargeAnswersLeaveFreeGoesBackToTheSystem)
 {
-#ifdef SENSOR_PROFILE_OTHER_MALLOC
-    GTEST_SKIP() << "the sanitizer's memory is not given back";
-#endif
     EXPECT_LT(leftBehindBy(10'000), 16U);
 }
 
 TEST(MemoryReturn, SmallerAnswersKeepItForTheNext)
 {
-#ifdef SENSOR_PROFILE_OTHER_MALLOC
-    GTEST_SKIP() << "the sanitizer's memory is not given back";
-#endif
     EXPECT_GT(leftBehindBy(9'999), 48U);
 }
 

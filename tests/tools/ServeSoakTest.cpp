@@ -5,6 +5,7 @@
 // SENSOR_PROFILE_SOAK_SECONDS makes it longer.
 
 #include "platform/utilities/ProviderUtilities.h"
+#include "tests/support/CimCall.h"
 #include "tests/support/HttpClient.h"
 #include "tests/support/MountNamespace.h"
 #include "tests/tools/ServerProcess.h"
@@ -38,57 +39,26 @@ std::chrono::seconds soakTime()
     return std::chrono::seconds(wanted == nullptr ? 5 : std::atoi(wanted));
 }
 
-std::string callOf(const std::string& operation, const std::string& parameters)
-{
-    const std::string body =
-        R"(<CIM CIMVERSION="2.0" DTDVERSION="2.0"><MESSAGE ID="1" PROTOCOLVERSION="1.0">)"
-        R"(<SIMPLEREQ><IMETHODCALL NAME=")" +
-        operation +
-        R"("><LOCALNAMESPACEPATH><NAMESPACE NAME="root"/><NAMESPACE NAME="cimv2"/>)"
-        R"(</LOCALNAMESPACEPATH>)" +
-        parameters + "</IMETHODCALL></SIMPLEREQ></MESSAGE></CIM>";
-    return "POST /cimom HTTP/1.1\r\nHost: localhost\r\nContent-Type: application/xml\r\n"
-           "CIMOperation: MethodCall\r\nCIMMethod: " +
-           operation +
-           "\r\nCIMObject: root/cimv2\r\nContent-Length: " + std::to_string(body.size()) +
-           "\r\n\r\n" + body;
-}
-
-std::string parameterOf(const std::string& name, const std::string& content)
-{
-    return "<IPARAMVALUE NAME=\"" + name + "\">" + content + "</IPARAMVALUE>";
-}
-
-using Keys = std::vector<std::pair<std::string, std::string>>;
-
-std::string objectOf(const std::string& name, const Keys& keys)
-{
-    std::string text = "<INSTANCENAME CLASSNAME=\"" + name + "\">";
-    for (const auto& [key, value] : keys)
-        text += "<KEYBINDING NAME=\"" + key + "\"><KEYVALUE>" + value + "</KEYVALUE></KEYBINDING>";
-    return text + "</INSTANCENAME>";
-}
-
-const std::string allSensors = callOf(
-    "EnumerateInstances", parameterOf("ClassName", "<CLASSNAME NAME=\"ZUMLO_NumericSensor\"/>"));
+const std::string allSensors =
+    cimRequest("EnumerateInstances", cimClassParameter("ZUMLO_NumericSensor"));
 
 std::string devicesOfTheSystem()
 {
-    return callOf("Associators",
-        parameterOf("ObjectName",
-            objectOf("ZUMLO_ComputerSystem",
+    return cimRequest("Associators",
+        cimParameter("ObjectName",
+            cimInstanceName("ZUMLO_ComputerSystem",
                 {{"CreationClassName", "ZUMLO_ComputerSystem"}, {"Name", Vorn::getSystemName()}})));
 }
 
 // One of the chip that stays.
 std::string oneSensor()
 {
-    const std::string sensor = objectOf(
+    const std::string sensor = cimInstanceName(
         "ZUMLO_NumericSensor", {{"CreationClassName", "ZUMLO_NumericSensor"},
                                    {"DeviceID", "Package id 0:/hwmon/coretemp-isa-0000/temp1"},
                                    {"SystemCreationClassName", "ZUMLO_ComputerSystem"},
                                    {"SystemName", Vorn::getSystemName()}});
-    return callOf("GetInstance", parameterOf("InstanceName", sensor));
+    return cimRequest("GetInstance", cimParameter("InstanceName", sensor));
 }
 
 // How many sensors the answer holds; -1 when it is no whole answer or tells of an error.
@@ -201,8 +171,7 @@ protected:
 TEST_F(ServeSoakTest, ErrorsAreNotTakenForAnswers)
 {
     HttpClient client(server_->port());
-    client.send(
-        callOf("EnumerateInstances", parameterOf("ClassName", "<CLASSNAME NAME=\"No_Class\"/>")));
+    client.send(cimRequest("EnumerateInstances", cimClassParameter("No_Class")));
     const HttpReply error = client.receive();
     EXPECT_EQ(error.status, 200);
     EXPECT_EQ(sensorsOf(error), -1);

@@ -4,6 +4,7 @@
 
 #pragma once
 
+#include "tests/support/CimCall.h"
 #include "tests/support/HttpClient.h"
 #include "tests/support/TlsClient.h"
 #include "tests/tools/ServerProcess.h"
@@ -26,18 +27,7 @@ inline const std::string asAnn = "Authorization: Basic YW5uOnNlY3JldA==\r\n";
 inline std::string request(
     const std::string& moreFields = "", const std::string& operation = "EnumerateInstanceNames")
 {
-    const std::string body =
-        R"(<CIM CIMVERSION="2.0" DTDVERSION="2.0"><MESSAGE ID="1" PROTOCOLVERSION="1.0">)"
-        R"(<SIMPLEREQ><IMETHODCALL NAME=")" +
-        operation +
-        R"("><LOCALNAMESPACEPATH><NAMESPACE NAME="root"/><NAMESPACE NAME="cimv2"/></LOCALNAMESPACEPATH>)"
-        R"(<IPARAMVALUE NAME="ClassName"><CLASSNAME NAME="ZUMLO_NumericSensor"/></IPARAMVALUE>)"
-        R"(</IMETHODCALL></SIMPLEREQ></MESSAGE></CIM>)";
-    return "POST /cimom HTTP/1.1\r\nHost: localhost\r\nContent-Type: application/xml\r\n"
-           "CIMOperation: MethodCall\r\nCIMMethod: " +
-           operation +
-           "\r\nCIMObject: root/cimv2\r\nContent-Length: " + std::to_string(body.size()) + "\r\n" +
-           moreFields + "\r\n" + body;
+    return cimRequest(operation, cimClassParameter("ZUMLO_NumericSensor"), moreFields);
 }
 
 inline std::size_t sensorsIn(const std::string& answer)

@@ -61,7 +61,7 @@ std::string verdict(const Fields& fields, const std::string& method = "POST",
 std::string mismatch(const Fields& fields, const std::string& operation = "GetClass")
 {
     try {
-        requireMatch(check({"POST", "/cimom", "HTTP/1.1", fields}), Message(bodyFor(operation)));
+        requireMatch(check({"POST", "/cimom", "HTTP/1.1", fields}), Message(cimCall(operation)));
         return "ok";
     } catch (const HttpError& error) {
         return error.cimError();

@@ -10,6 +10,7 @@
 #include "host/http/ListeningSocket.h"
 #include "host/http/Passwords.h"
 #include "host/http/Server.h"
+#include "tests/support/CimCall.h"
 #include "tests/support/HttpClient.h"
 
 #include <gmock/gmock.h>
@@ -26,8 +27,12 @@ namespace HttpTests {
 
 using Host::CimXml::Caller;
 using Host::CimXml::Message;
+using Testing::cimCall;
+using Testing::cimFields;
+using Testing::cimRequest;
 using Testing::HttpClient;
 using Testing::HttpReply;
+using Testing::lengthField;
 
 // So many pieces of so many bytes.
 class PiecewiseAnswer : public Host::CimXml::Answer {
@@ -106,41 +111,13 @@ private:
     Plan plan_;
 };
 
-inline std::string bodyFor(const std::string& operation, const std::string& name = "root")
-{
-    return R"(<?xml version="1.0" encoding="utf-8"?><CIM CIMVERSION="2.0" DTDVERSION="2.0">)"
-           R"(<MESSAGE ID="1" PROTOCOLVERSION="1.0"><SIMPLEREQ><IMETHODCALL NAME=")" +
-           operation + R"("><LOCALNAMESPACEPATH><NAMESPACE NAME=")" + name +
-           R"("/><NAMESPACE NAME="cimv2"/></LOCALNAMESPACEPATH></IMETHODCALL></SIMPLEREQ>)"
-           "</MESSAGE></CIM>";
-}
-
-// The fields that a call of the operation needs, but for its length.
-inline std::string fieldsFor(const std::string& operation)
-{
-    return "Host: localhost\r\nContent-Type: application/xml\r\nCIMOperation: MethodCall\r\n"
-           "CIMMethod: " +
-           operation + "\r\nCIMObject: root/cimv2\r\n";
-}
-
-inline const std::string usualFields = fieldsFor("EnumerateClasses");
-
-inline std::string lengthField(const std::string& body)
-{
-    return "Content-Length: " + std::to_string(body.size()) + "\r\n";
-}
+inline const std::string usualFields = cimFields("EnumerateClasses");
 
 inline std::string post(const std::string& moreFields = "",
-    const std::string& body = bodyFor("EnumerateClasses"), const std::string& path = "/cimom")
+    const std::string& body = cimCall("EnumerateClasses"), const std::string& path = "/cimom")
 {
     return "POST " + path + " HTTP/1.1\r\n" + usualFields + lengthField(body) + moreFields +
            "\r\n" + body;
-}
-
-inline std::string call(const std::string& operation)
-{
-    const std::string body = bodyFor(operation);
-    return "POST /cimom HTTP/1.1\r\n" + fieldsFor(operation) + lengthField(body) + "\r\n" + body;
 }
 
 class HttpTest : public testing::Test {

@@ -46,7 +46,7 @@ TEST_F(RequestTest, TellsTheOperationWhoAsks)
 
 TEST_F(RequestTest, MandatoryPostIsAnsweredAlike)
 {
-    const std::string body = bodyFor("EnumerateClasses");
+    const std::string body = cimCall("EnumerateClasses");
     const HttpReply reply =
         ask("M-POST /cimom HTTP/1.1\r\nHost: localhost\r\nContent-Type: text/xml\r\n" +
             lengthField(body) +
@@ -80,9 +80,9 @@ TEST_F(RequestTest, ErrorsLeaveTheConnectionForFurtherRequests)
     EXPECT_EQ(invalid.status, 400);
     EXPECT_EQ(invalid.field("cimerror"), "request-not-loosely-valid");
     EXPECT_THAT(invalid.body, StartsWith("line 1, byte "));
-    client.send(post("", bodyFor("EnumerateClasses", "other")));
+    client.send(post("", cimCall("EnumerateClasses", {}, "other")));
     EXPECT_EQ(client.receive().field("cimerror"), "header-mismatch");
-    client.send(post("", bodyFor("EnumerateClasses"), "/elsewhere"));
+    client.send(post("", cimCall("EnumerateClasses"), "/elsewhere"));
     EXPECT_EQ(client.receive().status, 404);
     client.send("GET /cimom HTTP/1.1\r\nHost: localhost\r\n\r\n");
     const HttpReply notAllowed = client.receive();
@@ -100,7 +100,7 @@ TEST_F(RequestTest, PipelinedRequestsAreAnsweredInTheirOrder)
         operations.answerWith(message.methodName());
     });
     HttpClient client = connect();
-    client.send(call("First") + call("Second") + call("Third"));
+    client.send(cimRequest("First") + cimRequest("Second") + cimRequest("Third"));
     EXPECT_EQ(client.receive().body, "<answer/>");
     EXPECT_EQ(client.receive().body, "First"); // which came before
     EXPECT_EQ(client.receive().body, "Second");
@@ -110,7 +110,7 @@ TEST_F(RequestTest, PipelinedRequestsAreAnsweredInTheirOrder)
 
 TEST_F(RequestTest, BodyMayComeInChunks)
 {
-    const std::string body = bodyFor("EnumerateClasses");
+    const std::string body = cimCall("EnumerateClasses");
     const auto chunk = [](const std::string& text) {
         std::ostringstream size;
         size << std::hex << text.size();
@@ -140,7 +140,7 @@ TEST_F(RequestTest, ConnectionThatEndsSaysSo)
 
 TEST_F(RequestTest, ClientThatAwaitsASignGetsIt)
 {
-    const std::string body = bodyFor("EnumerateClasses");
+    const std::string body = cimCall("EnumerateClasses");
     HttpClient client = connect();
     client.send("POST /cimom HTTP/1.1\r\n" + usualFields + lengthField(body) +
                 "Expect: 100-continue\r\n\r\n");
@@ -175,7 +175,7 @@ TEST_F(RequestTest, LargeAnswersComeInChunks)
 TEST_F(RequestTest, OldClientsGetTheAnswerUntilTheEndOfTheConnection)
 {
     operations.answerWith(std::string(1000, 'x'), 500);
-    const std::string body = bodyFor("EnumerateClasses");
+    const std::string body = cimCall("EnumerateClasses");
     HttpClient client = connect();
     client.send("POST /cimom HTTP/1.0\r\n" + usualFields + lengthField(body) + "\r\n" + body);
     std::string all;

@@ -160,7 +160,7 @@ TEST_F(SignInTest, WhoSignsInGoesOnOnTheSameConnection)
 TEST_F(SignInTest, BodiesThatComeInChunksOrNotAtAllSignInToo)
 {
     start();
-    const std::string body = bodyFor("EnumerateClasses");
+    const std::string body = cimCall("EnumerateClasses");
     HttpClient client = connect();
     std::ostringstream size;
     size << std::hex << body.size();
@@ -180,7 +180,7 @@ TEST_F(SignInTest, BodiesThatComeInChunksOrNotAtAllSignInToo)
 TEST_F(SignInTest, ClientThatAwaitsASignSignsInFirst)
 {
     start();
-    const std::string body = bodyFor("EnumerateClasses");
+    const std::string body = cimCall("EnumerateClasses");
     const std::string head =
         "POST /cimom HTTP/1.1\r\n" + usualFields + lengthField(body) + "Expect: 100-continue\r\n";
     HttpClient refused = connect();

@@ -72,25 +72,25 @@ protected:
     {
         HttpClient client = connect();
         for (int i = 0; i < 20; ++i)
-            expectAnswer(client, call(i % 10 == 0 ? "Large" : "Small"));
+            expectAnswer(client, cimRequest(i % 10 == 0 ? "Large" : "Small"));
     }
     void askEncrypted()
     {
         TlsClient client(tlsPort_);
         for (int i = 0; i < 5; ++i)
-            expectAnswer(client, call("Large"));
+            expectAnswer(client, cimRequest("Large"));
     }
     void askBadly()
     {
         HttpClient client = connect();
         expectAnswer(client, post("", "<CIM/>"), 400);
-        expectAnswer(client, call("Fail"), 500);
+        expectAnswer(client, cimRequest("Fail"), 500);
         client.send(post().substr(0, 150));
     }
     void breakOff()
     {
         HttpClient client = connect();
-        client.send(call("Large"));
+        client.send(cimRequest("Large"));
         client.receiveSome();
         client.closeHard();
     }
