@@ -81,7 +81,7 @@ TEST(ManualOfTheTool, hasTheDefaultsOfTheServer)
             << each->str();
 }
 
-// What the file shows as settings are options, with the values they have without it.
+// What the file shows as settings are options, the ports with the values they have without it.
 TEST(SettingsOfTheService, areOptionsOfTheServer)
 {
     static const std::regex setting("#([a-z-]+) = (.*)");
@@ -121,6 +121,43 @@ TEST(ManualOfTheModel, hasTheMembersOfTheSchema)
         EXPECT_THAT(page, HasSubstr(name));
 }
 
+// The row of each status of a model file in the tables of the operations page; one row may be for
+// several of them.
+const std::string meaninglessStatus = "has a status that means nothing";
+const std::map<unsigned, std::string> rowsOfStatuses = {{0, "has no status"},
+    {1, "is within its limits"}, {2, "starts"}, {3, "starts"}, {8, "is dormant"},
+    {9, meaninglessStatus}, {10, "starts"}, {12, "is offline"}, {13, "is faulty"},
+    {16, "is switched off"}, {17, "has no contact"}, {20, "will fail soon"}, {21, "is in an alarm"},
+    {22, "reached a lower or upper limit of the first"},
+    {23, "reached a lower or upper limit of the first"}, {24, "is beyond a limit"},
+    {25, "reached a limit of the second"}, {26, "reached a limit of the second"}};
+
+// In a list such as "1 normal, 12 offline".
+std::vector<unsigned> codesIn(const std::string& list)
+{
+    static const std::regex code("([0-9]+) +[a-z]+ ?[a-z]*[,.]");
+    std::vector<unsigned> codes;
+    for (std::sregex_iterator each(list.begin(), list.end(), code), end; each != end; ++each)
+        codes.push_back(static_cast<unsigned>(std::stoul((*each)[1])));
+    return codes;
+}
+
+TEST(ManualOfTheModel, hasTheStatusesOfTheOperationsPage)
+{
+    std::vector<unsigned> expected;
+    for (const auto& [status, row] : rowsOfStatuses)
+        if (row != meaninglessStatus)
+            expected.push_back(status);
+    const std::string page = rendered("sensor-profile-model.5");
+    const auto begin = page.find("A code: ");
+    ASSERT_NE(begin, std::string::npos);
+    EXPECT_EQ(codesIn(page.substr(begin, page.find("0 when left out") - begin)), expected);
+    const auto schema = nlohmann::json::parse(
+        contentOf(SENSOR_PROFILE_SOURCE_DIR "/schema/sensor-profile-model.schema.json"));
+    EXPECT_EQ(
+        codesIn(schema.at("/$defs/node/properties/status/description"_json_pointer)), expected);
+}
+
 // What a sensor with a status of the model file shows.
 nlohmann::json shownWith(unsigned status)
 {
@@ -151,18 +188,11 @@ TEST(ManualOfTheClasses, hasTheStatesThatSensorsShow)
     }
 }
 
-// The same on the operations page, whose rows may be for several states.
+// The same on the operations page.
 TEST(OperationsPage, hasTheStatesThatSensorsShow)
 {
-    const std::map<unsigned, std::string> rows = {{0, "has no status"}, {1, "is within its limits"},
-        {2, "starts"}, {3, "starts"}, {8, "is dormant"}, {9, "has a status that means nothing"},
-        {10, "starts"}, {12, "is offline"}, {13, "is faulty"}, {16, "is switched off"},
-        {17, "has no contact"}, {20, "will fail soon"}, {21, "is in an alarm"},
-        {22, "reached a lower or upper limit of the first"},
-        {23, "reached a lower or upper limit of the first"}, {24, "is beyond a limit"},
-        {25, "reached a limit of the second"}, {26, "reached a limit of the second"}};
     const std::string page = contentOf(SENSOR_PROFILE_SOURCE_DIR "/docs/operations.md");
-    for (const auto& [status, row] : rows) {
+    for (const auto& [status, row] : rowsOfStatuses) {
         const auto shown = shownWith(status);
         const std::string state = shown["CurrentState"].get<std::string>();
         const std::string operational = shown["OperationalStatus"].empty()
@@ -176,22 +206,44 @@ TEST(OperationsPage, hasTheStatesThatSensorsShow)
     }
 }
 
-// Every property that is published has a row there.
+// From a text to the next of these texts.
+std::string partOf(const std::string& page, const std::string& start, const std::regex& next)
+{
+    const auto begin = page.find(start);
+    EXPECT_NE(begin, std::string::npos) << start;
+    if (begin == std::string::npos)
+        return "";
+    const std::string rest = page.substr(begin + start.size());
+    std::smatch end;
+    return std::regex_search(rest, end, next) ? end.prefix().str() : rest;
+}
+
+// Every property that is published is told of where its class is.
 TEST(OperationsPage, tellsOfEveryProperty)
 {
+    const std::map<std::string, std::string> starts = {{"ZUMLO_NumericSensor", "\nA sensor, "},
+        {"ZUMLO_ComputerSystem", "\nThe computer, "},
+        {"ZUMLO_SensorEnabledLogicalElementCapabilities", "\nThe capabilities, "},
+        {"ZUMLO_SensorElementCapabilities", "\nThe associations "},
+        {"ZUMLO_SensorSystemDevice", "\nThe associations "}};
     const std::string page = contentOf(SENSOR_PROFILE_SOURCE_DIR "/docs/operations.md");
+    const std::string manual = rendered("sensor-profile.7");
     const std::string model = SENSOR_PROFILE_SOURCE_DIR "/schema/demo-model.json";
     std::size_t properties = 0;
-    for (const char* const className : {"ZUMLO_NumericSensor", "ZUMLO_ComputerSystem",
-             "ZUMLO_SensorEnabledLogicalElementCapabilities", "ZUMLO_SensorElementCapabilities",
-             "ZUMLO_SensorSystemDevice"}) {
+    for (const auto& [className, start] : starts) {
+        const std::string part =
+            partOf(page, start, std::regex("\n(A|The) [a-z]+,? (`|have)|\n## "));
+        EXPECT_THAT(part, HasSubstr("`" + className + "`"));
+        const std::string manualPart =
+            partOf(manual, "\n   " + className + "\n", std::regex("\n   [A-Z]|\n[A-Z]"));
         const auto document =
             nlohmann::json::parse(run({"list", className, "--json", "--model", model}).out);
         for (const auto& instance : document["instances"])
             for (const auto& [name, value] : instance["properties"].items()) {
                 ++properties;
-                EXPECT_NE(page.find("`" + name + "`"), std::string::npos)
-                    << className << "." << name;
+                EXPECT_THAT(part, HasSubstr("`" + name + "`")) << className;
+                EXPECT_TRUE(std::regex_search(manualPart, std::regex("\\b" + name + "\\b")))
+                    << className << "." << name << " in the manual";
             }
     }
     EXPECT_GT(properties, 40U);
