@@ -45,6 +45,14 @@ link_libraries() {
   done
 }
 
+has_links() {
+  local each
+  for each in "${libraries[@]}"; do
+    if is_our_link "$used_folder/$each"; then return; fi
+  done
+  return 1
+}
+
 unlink_libraries() {
   local each
   for each in "${libraries[@]}"; do

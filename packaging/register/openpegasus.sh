@@ -45,7 +45,8 @@ openpegasus_register() {
 openpegasus_remove() {
   # What is listed does not say in which namespace it is.
   [ -z "$namespace" ] ||
-    refuse_usage "--namespace: remove takes everything from OpenPegasus, in whichever namespace it is"
+    refuse_usage "--namespace: remove takes everything from OpenPegasus," \
+      "in whichever namespace it is"
   find_registered_modules
   remove_modules
   unlink_libraries

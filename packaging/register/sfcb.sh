@@ -6,6 +6,8 @@
 
 registration_name=sensor-profile.reg
 class_names=(sensor-profile-computer-system.mof sensor-profile.mof)
+# What a removal found.
+was_registered=false
 
 # Finds our files in `stage`, and sets `registered_in` to the namespace that the registration file
 # names; empty when there is none.
@@ -16,10 +18,20 @@ look_at_stage() {
   [ -z "$staging_folder" ] || staging=(-s "$staging_folder")
   file=$stage/regs/$registration_name
   registered_in=''
+  refuse_unreadable_stage
   [ -e "$file" ] || return 0
   registered_in=$(sed -n '/^ *namespace: */{s///;p;q}' "$file")
   grep --quiet '^\[ZUMLO_ComputerSystem\]' "$file" || options+=(--without-computer-system)
   earlier_command=$(command_to register --namespace "$registered_in" "${options[@]}")
+}
+
+# What lies in a folder that cannot be looked into would pass for not being staged.
+refuse_unreadable_stage() {
+  local folder
+  [ -d "$stage" ] || return 0
+  folder=$(find "$stage" -type d \( ! -readable -o ! -executable \) -print -quit 2>/dev/null) ||
+    true
+  [ -z "$folder" ] || refuse "$folder cannot be read"
 }
 
 removal_command() { command_to remove --namespace "$namespace"; }
@@ -75,11 +87,13 @@ sfcb_remove() {
   if [ -n "$registered_in" ] && [ -n "$namespace" ] && [ "$namespace" != "$registered_in" ]; then
     echo "The registration stays: it is for $registered_in."
     [ ${#staged[@]} -gt 0 ] || return 0
+    was_registered=true
     step rm "${staged[@]}"
     step sfcbrepos "${staging[@]}" -f
     return
   fi
   [ -z "$registered_in" ] || staged+=("$stage/regs/$registration_name")
+  if [ ${#staged[@]} -gt 0 ] || has_links; then was_registered=true; fi
   [ ${#staged[@]} -eq 0 ] || step rm "${staged[@]}"
   # Even if nothing was staged: an earlier attempt may have failed here.
   step sfcbrepos "${staging[@]}" -f

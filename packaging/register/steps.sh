@@ -21,7 +21,7 @@ quoted() {
 # command_to ACTION [OPTION]...: the command that does it with the same object manager and folders,
 # to be typed.
 command_to() {
-  local words=("$own_name" "$1" --object-manager "$object_manager" "${@:2}")
+  local words=("$own_command" "$1" --object-manager "$object_manager" "${@:2}")
   [ -z "$provider_folder" ] || words+=(--provider-folder "$provider_folder")
   [ "$object_manager" != sfcb ] || [ -z "$staging_folder" ] ||
     words+=(--staging-folder "$staging_folder")
@@ -30,7 +30,7 @@ command_to() {
 
 # Something is not as it must be, and no step was taken yet.
 refuse() {
-  complain "$1"
+  complain "$@"
   echo "Nothing was changed." >&2
   exit 1
 }
@@ -55,13 +55,26 @@ report_failure() {
   exit 1
 }
 
-# Prints a command that changes something and runs it; when it fails, nothing after it is done.
+# A signal came. A second one is not held up.
+end_interrupted_step() {
+  trap - INT TERM HUP
+  [ -z "$running_step" ] || kill "$running_step" 2>/dev/null || true
+  wait
+  report_failure "interrupted: $1"
+}
+
+# Prints a command that changes something and runs it; when it fails, nothing after it is done. It
+# runs beside the shell, which would put off a signal until it ends.
 step() {
-  local line status=0
+  local line status=0 running_step=''
   line=$(quoted "$@")
   echo "$line"
   "$is_dry_run" && return
-  "$@" || status=$?
+  trap 'end_interrupted_step "$line"' INT TERM HUP
+  "$@" <&0 &
+  running_step=$!
+  wait "$running_step" || status=$?
+  trap - INT TERM HUP
   [ $status -eq 0 ] || report_failure "failed with exit code $status: $line"
   steps_done+=("$line")
 }

@@ -4,6 +4,8 @@
 
 #include "tests/packaging/RegisterTest.h"
 
+#include <csignal>
+
 namespace {
 
 using testing::AllOf;
@@ -20,10 +22,7 @@ protected:
 
     Lines modules() const { return linesOf(contentOf(path("modules"))); }
 
-    std::string linkStep(const std::string& name) const
-    {
-        return "ln -s " + library(name) + " " + path("providers/" + name);
-    }
+    static constexpr std::size_t callsBeforeSteps = 1; // it is asked what is registered
 
     const std::string registration_ = shared("registration/sensor-profile-registration.mof");
     const std::string systemStep_ =
@@ -143,8 +142,8 @@ TEST_F(OpenPegasus, registersInAnotherNamespace)
 {
     EXPECT_THAT(mustRun({"register", "--namespace=root/sensors_2"}),
         HasSubstr("Registered in root/sensors_2."));
-    EXPECT_THAT(
-        calls()[1], "cimmof -uc -n root/sensors_2 " + shared("sensor-profile-computer-system.mof"));
+    EXPECT_THAT(calls().at(1),
+        "cimmof -uc -n root/sensors_2 " + shared("sensor-profile-computer-system.mof"));
     std::string document = contentOf(registration_);
     for (auto at = document.find("root/cimv2"); at != std::string::npos;
          at = document.find("root/cimv2"))
@@ -192,41 +191,18 @@ TEST_F(OpenPegasus, aServerThatDoesNotAnswerIsAFailureBeforeAnyStep)
     }
 }
 
-// Whichever step fails, the message lists the steps before it, and the command that it names undoes
-// them.
-class EveryStepOfOpenPegasus : public OpenPegasus, public testing::WithParamInterface<std::size_t> {
-protected:
-    EveryStepOfOpenPegasus()
-    {
-        addCommand("ln");
-        addCommand("rm");
-    }
-
-    // Runs what fails at the parameter's step.
-    std::string failing(const char* action, const Lines& steps)
-    {
-        const std::size_t done = GetParam();
-        calls();
-        failAt(done + 2); // the first call asks what is registered
-        const Ended ended = runRegister({action});
-        failNoMore();
-        EXPECT_EQ(ended.code, 1);
-        EXPECT_THAT(ended.err, HasSubstr(failureAt(done, steps)));
-        return ended.err;
-    }
-};
-
-class EveryRegistrationStepOfOpenPegasus : public EveryStepOfOpenPegasus {};
+class EveryRegistrationStepOfOpenPegasus : public EveryStepOf<OpenPegasus> {};
 
 TEST_P(EveryRegistrationStepOfOpenPegasus, canFailAndBeUndone)
 {
     folder_.write("modules", "SensorProfileModule\nSensorProfileComputerSystemModule\n");
-    const std::string message = failing("register",
-        {linkStep("libSensorProfileProvider.so"), linkStep("libComputerSystemProvider.so"),
-            systemStep_, sensorStep_, "cimprovider -r -m SensorProfileModule",
+    const std::string message = failing({"register"},
+        {linkStep(sensorLibrary_), linkStep(systemLibrary_), systemStep_, sensorStep_,
+            "cimprovider -r -m SensorProfileModule",
             "cimprovider -r -m SensorProfileComputerSystemModule", registrationStep_});
     EXPECT_THAT(
-        message, HasSubstr("Then, for what was registered before: sensor-profile-register register "
+        message, HasSubstr("Then, for what was registered before: " + program_ +
+                           " register "
                            "--object-manager openpegasus --namespace NAMESPACE --provider-folder " +
                            path("providers") + " (NAMESPACE being the one it was in)\n"));
 
@@ -240,19 +216,18 @@ TEST_P(EveryRegistrationStepOfOpenPegasus, canFailAndBeUndone)
 INSTANTIATE_TEST_SUITE_P(
     Steps, EveryRegistrationStepOfOpenPegasus, testing::Range<std::size_t>(0, 7));
 
-class EveryRemovalStepOfOpenPegasus : public EveryStepOfOpenPegasus {};
+class EveryRemovalStepOfOpenPegasus : public EveryStepOf<OpenPegasus> {};
 
 TEST_P(EveryRemovalStepOfOpenPegasus, canFailAndBeRepeated)
 {
     mustRun({"register"});
     const std::string message =
-        failing("remove", {"cimprovider -r -m SensorProfileModule",
-                              "cimprovider -r -m SensorProfileComputerSystemModule",
-                              "rm " + path("providers/libSensorProfileProvider.so"),
-                              "rm " + path("providers/libComputerSystemProvider.so")});
-    EXPECT_THAT(message,
-        HasSubstr("To undo it: sensor-profile-register register --object-manager openpegasus "
-                  "--namespace NAMESPACE --provider-folder "));
+        failing({"remove"}, {"cimprovider -r -m SensorProfileModule",
+                                "cimprovider -r -m SensorProfileComputerSystemModule",
+                                unlinkStep(sensorLibrary_), unlinkStep(systemLibrary_)});
+    EXPECT_THAT(message, HasSubstr("To undo it: " + program_ +
+                                   " register --object-manager openpegasus "
+                                   "--namespace NAMESPACE --provider-folder "));
     mustRun({"remove"});
     EXPECT_THAT(modules(), IsEmpty());
     EXPECT_THAT(links(), IsEmpty());
@@ -266,9 +241,42 @@ TEST_F(OpenPegasus, anUndoneRemovalIsARegistrationAsItWas)
     calls();
     failAt(2);
     const Ended ended = runRegister({"remove"});
-    EXPECT_THAT(ended.err,
-        HasSubstr("To undo it: sensor-profile-register register --object-manager openpegasus "
-                  "--namespace NAMESPACE --without-computer-system --provider-folder "));
+    EXPECT_THAT(
+        ended.err, HasSubstr("To undo it: " + program_ +
+                             " register --object-manager openpegasus "
+                             "--namespace NAMESPACE --without-computer-system --provider-folder "));
+}
+
+// A command that hangs is ended, too.
+TEST_F(OpenPegasus, aSignalDuringAStepIsAFailureOfIt)
+{
+    folder_.write("hang-at", "2");
+    const std::string script = "env --default-signal=INT \"$@\" &\n"
+                               "until [ -e \"$STAND_IN/hanging\" ]; do sleep 0.02; done\n"
+                               "kill -$0 $!\n"
+                               "wait $!";
+    for (const std::string signal : {"INT", "TERM", "HUP"}) {
+        const Ended ended = runWords({"/bin/bash", "-c", script, signal, program_, "register",
+            "--provider-folder", path("providers")});
+        EXPECT_EQ(ended.code, 1) << signal;
+        EXPECT_THAT(ended.err, AllOf(HasSubstr("sensor-profile-register: interrupted: " +
+                                               systemStep_ + "\nIt may have done part of its work"),
+                                   HasSubstr("To undo it: " + program_ + " remove ")));
+        EXPECT_EQ(::kill(std::stoi(contentOf(path("hanging"))), 0), -1);
+        calls();
+        fs::remove(path("hanging"));
+    }
+}
+
+// Where the name alone leads to it, that is how it is told to be typed.
+TEST_F(OpenPegasus, adviceNamesTheCommandAsItIsFound)
+{
+    fs::create_symlink(program_, path("bin/sensor-profile-register"));
+    failAt(2);
+    EXPECT_THAT(runWords({path("bin/sensor-profile-register"), "register", "--provider-folder",
+                             path("providers")})
+                    .err,
+        HasSubstr("To undo it: sensor-profile-register remove "));
 }
 
 TEST_F(OpenPegasus, aFirstRegistrationThatFailsSpeaksOfNoEarlierOne)

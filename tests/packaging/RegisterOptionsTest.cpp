@@ -42,6 +42,10 @@ TEST_F(WithoutObjectManager, refusesCommandLinesThatMakeNoSense)
     expectRefusal({}, 2, "a command is missing");
     expectRefusal({"install"}, 2, "unknown command install");
     expectRefusal({"register", "remove"}, 2, "register and remove exclude each other");
+    expectRefusal({"register", "register"}, 2, "register stands there twice");
+    expectRefusal({"register", "--dry-run=yes"}, 2, "--dry-run takes no value");
+    expectRefusal({"--help=1"}, 2, "--help takes no value");
+    expectRefusal({"register", "--without-computer-system=no"}, 2, "takes no value");
     expectRefusal({"register", "--force"}, 2, "unknown option --force");
     expectRefusal({"register", "-n"}, 2, "unknown option -n");
     expectRefusal({"register", "--namespace"}, 2, "--namespace needs a value");

@@ -38,12 +38,20 @@ protected:
             SENSOR_PROFILE_SOURCE_DIR "/tests/packaging/stand-in", path("bin/" + command));
     }
 
-    // Those that the machine has, unless the arguments name others.
-    Ended runAsTyped(const Lines& arguments) const
+    // With the stand-ins; the first word is a command.
+    Ended runWords(const Lines& words) const
     {
-        return run(arguments, {.program = program_,
-                                  .environment = {{"PATH", path("bin") + ":/usr/bin:/bin"},
-                                      {"STAND_IN", folder_.path().string()}}});
+        return run({words.begin() + 1, words.end()},
+            {.program = words.at(0),
+                .environment = {{"PATH", path("bin") + ":/usr/bin:/bin"},
+                    {"STAND_IN", folder_.path().string()}}});
+    }
+
+    // With the folders that the machine has, unless the arguments name others.
+    Ended runAsTyped(Lines arguments) const
+    {
+        arguments.insert(arguments.begin(), program_);
+        return runWords(arguments);
     }
 
     // With folders of the test's own: the machine may have object managers.
@@ -68,7 +76,7 @@ protected:
     void mustRunAdvice(
         const std::string& message, const std::string& before, const std::string& after) const
     {
-        const std::string start = before + "sensor-profile-register ";
+        const std::string start = before + program_ + " ";
         const auto begin = message.find(start);
         ASSERT_NE(begin, std::string::npos) << message;
         std::istringstream command(message.substr(begin + start.size(),
@@ -92,6 +100,16 @@ protected:
     std::string path(const std::string& name) const { return (folder_.path() / name).string(); }
 
     Lines links() const { return filesBelow(path("providers")); }
+
+    std::string linkStep(const std::string& name) const
+    {
+        return "ln -s " + library(name) + " " + path("providers/" + name);
+    }
+
+    std::string unlinkStep(const std::string& name) const
+    {
+        return "rm " + path("providers/" + name);
+    }
 
     // What a message begins with when the step after so many done ones fails.
     static std::string failureAt(std::size_t done, const Lines& steps)
@@ -117,6 +135,9 @@ protected:
     }
 
     TemporaryFolder folder_;
+    const std::string program_ = (movedInstallation() / "sbin/sensor-profile-register").string();
+    static constexpr const char* sensorLibrary_ = "libSensorProfileProvider.so";
+    static constexpr const char* systemLibrary_ = "libComputerSystemProvider.so";
 
 private:
     static std::string succeeding(const Ended& ended)
@@ -125,8 +146,33 @@ private:
         EXPECT_EQ(ended.err, "");
         return ended.out;
     }
+};
 
-    const std::string program_ = (movedInstallation() / "sbin/sensor-profile-register").string();
+// Whichever step fails, the message lists the steps before it, and the commands that it names lead
+// back to what was before. The object manager's class says how many calls come before all steps.
+template <typename ObjectManager>
+class EveryStepOf : public ObjectManager, public ::testing::WithParamInterface<std::size_t> {
+protected:
+    using Lines = typename ObjectManager::Lines;
+
+    EveryStepOf()
+    {
+        this->addCommand("ln");
+        this->addCommand("rm");
+    }
+
+    // Runs what fails at the parameter's step.
+    std::string failing(const Lines& arguments, const Lines& steps)
+    {
+        const std::size_t done = this->GetParam();
+        this->calls();
+        this->failAt(ObjectManager::callsBeforeSteps + done + 1);
+        const Ended ended = this->runRegister(arguments);
+        this->failNoMore();
+        EXPECT_EQ(ended.code, 1);
+        EXPECT_THAT(ended.err, ::testing::HasSubstr(this->failureAt(done, steps)));
+        return ended.err;
+    }
 };
 
 } // namespace Testing

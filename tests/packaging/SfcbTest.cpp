@@ -4,6 +4,8 @@
 
 #include "tests/packaging/RegisterTest.h"
 
+#include <unistd.h>
+
 namespace {
 
 using testing::AllOf;
@@ -17,6 +19,8 @@ namespace fs = std::filesystem;
 class Sfcb : public RegisterTest {
 protected:
     Sfcb() : RegisterTest({"sfcbstage", "sfcbrepos"}) {}
+
+    static constexpr std::size_t callsBeforeSteps = 0;
 
     Lines stage() const { return filesBelow(path("stage")); }
 
@@ -78,8 +82,39 @@ TEST_F(Sfcb, removesWhatWasStaged)
     EXPECT_THAT(calls(), ElementsAre(buildStep_));
     EXPECT_THAT(stage(), ElementsAre("regs/other.reg"));
     EXPECT_THAT(links(), IsEmpty());
-    mustRun({"remove"});
+    EXPECT_THAT(mustRun({"remove"}),
+        AllOf(HasSubstr("Nothing of this product was registered."), Not(HasSubstr("Removed"))));
     EXPECT_THAT(stage(), ElementsAre("regs/other.reg"));
+}
+
+TEST_F(Sfcb, removesLinksThatAreLeftOfIt)
+{
+    mustRun({"register"});
+    fs::remove_all(path("stage/regs"));
+    fs::remove_all(path("stage/mofs"));
+    EXPECT_THAT(mustRun({"remove"}), HasSubstr("Removed."));
+    EXPECT_THAT(links(), IsEmpty());
+}
+
+// As somebody to whom permissions apply: root without the right to pass them over.
+TEST_F(Sfcb, refusesAStageThatCannotBeLookedInto)
+{
+    mustRun({"register"});
+    for (const char* const name : {"stage/regs", "stage/mofs/root", "stage"}) {
+        calls();
+        fs::permissions(path(name), fs::perms::none);
+        Lines words = {program_, "remove", "--provider-folder", path("providers"),
+            "--staging-folder", path("stage")};
+        if (::geteuid() == 0)
+            words.insert(words.begin(),
+                {"/usr/bin/setpriv", "--bounding-set", "-dac_override,-dac_read_search"});
+        const Ended ended = runWords(words);
+        fs::permissions(path(name), fs::perms::owner_all);
+        EXPECT_EQ(ended.code, 1);
+        EXPECT_THAT(ended.err, HasSubstr(path(name) + " cannot be read\nNothing was changed."));
+        EXPECT_THAT(calls(), IsEmpty());
+        EXPECT_EQ(links().size(), 2U);
+    }
 }
 
 TEST_F(Sfcb, removingNeedsTheStagingFolder)
@@ -186,10 +221,7 @@ TEST_F(Sfcb, dryRunCanBeFollowed)
     EXPECT_THAT(script, Not(HasSubstr("/tmp.")));
     EXPECT_THAT(script, testing::StartsWith("sed -e 's|root/cimv2|root/s|' -e '"));
     fs::create_directory(path("own"));
-    const Ended followed = run({"-ec", "cd '" + path("own") + "'\n" + script},
-        {.program = "/bin/sh",
-            .environment = {
-                {"PATH", path("bin") + ":/usr/bin:/bin"}, {"STAND_IN", folder_.path().string()}}});
+    const Ended followed = runWords({"/bin/sh", "-ec", "cd '" + path("own") + "'\n" + script});
     ASSERT_EQ(followed.code, 0) << followed.err;
     const Lines files = stage();
     const std::string registration = stagedRegistration();
@@ -203,39 +235,12 @@ TEST_F(Sfcb, dryRunCanBeFollowed)
     EXPECT_EQ(links(), linked);
 }
 
-// Whichever step fails, the message lists the steps before it, and the commands that it names
-// lead back to what was before.
-class EveryStepOfSfcb : public Sfcb, public testing::WithParamInterface<std::size_t> {
-protected:
-    EveryStepOfSfcb()
-    {
-        addCommand("ln");
-        addCommand("rm");
-    }
-
-    // Runs what fails at the parameter's step.
-    std::string failing(const Lines& arguments, const Lines& steps)
-    {
-        const std::size_t done = GetParam();
-        calls();
-        failAt(done + 1);
-        const Ended ended = runRegister(arguments);
-        failNoMore();
-        EXPECT_EQ(ended.code, 1);
-        EXPECT_THAT(ended.err, HasSubstr(failureAt(done, steps)));
-        return ended.err;
-    }
-};
-
-class EveryFirstStepOfSfcb : public EveryStepOfSfcb {};
+class EveryFirstStepOfSfcb : public EveryStepOf<Sfcb> {};
 
 TEST_P(EveryFirstStepOfSfcb, canFailAndBeUndone)
 {
     const std::string message =
-        failing({"register"}, {"ln -s " + library("libSensorProfileProvider.so") + " " +
-                                      path("providers/libSensorProfileProvider.so"),
-                                  "ln -s " + library("libComputerSystemProvider.so") + " " +
-                                      path("providers/libComputerSystemProvider.so"),
+        failing({"register"}, {linkStep(sensorLibrary_), linkStep(systemLibrary_),
                                   stageStep(computerSystem_), stageStep(sensors_), buildStep_});
     EXPECT_THAT(message, Not(HasSubstr("registered before")));
     mustRunAdvice(message, "To undo it: ", "\n");
@@ -247,7 +252,7 @@ TEST_P(EveryFirstStepOfSfcb, canFailAndBeUndone)
 
 INSTANTIATE_TEST_SUITE_P(Steps, EveryFirstStepOfSfcb, testing::Range<std::size_t>(0, 5));
 
-class EveryMovingStepOfSfcb : public EveryStepOfSfcb {};
+class EveryMovingStepOfSfcb : public EveryStepOf<Sfcb> {};
 
 TEST_P(EveryMovingStepOfSfcb, canFailAndLeadBack)
 {
@@ -255,9 +260,7 @@ TEST_P(EveryMovingStepOfSfcb, canFailAndLeadBack)
     const Lines files = stage();
     const std::string registration = stagedRegistration();
     const std::string message = failing({"register", "--namespace", "root/new"},
-        {"ln -s " + library("libComputerSystemProvider.so") + " " +
-                path("providers/libComputerSystemProvider.so"),
-            stageStep(computerSystem_, "root/new", "sensor-profile.reg"),
+        {linkStep(systemLibrary_), stageStep(computerSystem_, "root/new", "sensor-profile.reg"),
             stageStep(sensors_, "root/new", "sensor-profile.reg"),
             "rm " + stagedMof("root/cimv2/sensor-profile.mof"), buildStep_});
     mustRunAdvice(message, "To undo it: ", "\n");
@@ -269,7 +272,7 @@ TEST_P(EveryMovingStepOfSfcb, canFailAndLeadBack)
 
 INSTANTIATE_TEST_SUITE_P(Steps, EveryMovingStepOfSfcb, testing::Range<std::size_t>(0, 5));
 
-class EveryRemovalStepOfSfcb : public EveryStepOfSfcb {
+class EveryRemovalStepOfSfcb : public EveryStepOf<Sfcb> {
 protected:
     EveryRemovalStepOfSfcb() { mustRun({"register", "--namespace", "root/s"}); }
 
@@ -279,8 +282,7 @@ protected:
             {"remove"}, {"rm " + stagedMof("root/s/sensor-profile-computer-system.mof") + " " +
                                 stagedMof("root/s/sensor-profile.mof") + " " +
                                 path("stage/regs/sensor-profile.reg"),
-                            buildStep_, "rm " + path("providers/libSensorProfileProvider.so"),
-                            "rm " + path("providers/libComputerSystemProvider.so")});
+                            buildStep_, unlinkStep(sensorLibrary_), unlinkStep(systemLibrary_)});
     }
 };
 
