@@ -13,6 +13,12 @@ _sensorctl_commands() {
   "$1" --help 2>/dev/null | sed -n '/^Subcommands:/,/^$/s/^  \([a-z]\{1,\}\) .*/\1/p'
 }
 
+# _sensorctl_takes TOOL COMMAND OPTION VALUE: whether such a value follows the option.
+_sensorctl_takes() {
+  [[ $3 == -* ]] && "$1" "$2" --help 2>/dev/null |
+    grep --quiet --extended-regexp -e "^  ([^ ]+,)?$3(,[^ ]+)? $4\\b"
+}
+
 _sensorctl() {
   local tool=$1 word=$2 previous=$3 command=${COMP_WORDS[1]}
   COMPREPLY=()
@@ -27,8 +33,10 @@ _sensorctl() {
   elif [ "$command" = list ] && [[ $previous != -* || $previous == --json ]]; then
     mapfile -t COMPREPLY < <(compgen -W "$("$tool" list --help 2>/dev/null |
       grep --only-matching -e 'ZUMLO_[A-Za-z]*') ZUMLO_NumericSensor" -- "$word")
-  else
+  elif _sensorctl_takes "$tool" "$command" "$previous" FILE; then
     mapfile -t COMPREPLY < <(compgen -f -- "$word")
+  elif [ "$previous" = --user ]; then
+    mapfile -t COMPREPLY < <(compgen -u -- "$word")
   fi
 }
 

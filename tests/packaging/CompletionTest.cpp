@@ -49,7 +49,16 @@ TEST(Completion, offersValues)
     EXPECT_THAT(offersFor({"list", "--color", "a"}), ElementsAre("auto", "always"));
     EXPECT_THAT(offersFor({"list", "ZUMLO_S"}), Each(StartsWith("ZUMLO_Sensor")));
     EXPECT_THAT(offersFor({"list", "ZUMLO_N"}), ElementsAre("ZUMLO_NumericSensor"));
-    EXPECT_THAT(offersFor({"list", "--model", "/etc/host"}), Contains("/etc/hosts"));
+    for (const char* const option : {"--model", "-o", "--output"})
+        EXPECT_THAT(offersFor({"record", option, "/etc/host"}), Contains("/etc/hosts"));
+    EXPECT_THAT(offersFor({"serve", "--user", "roo"}), Contains("root"));
+}
+
+TEST(Completion, offersNoFilesForOtherThings)
+{
+    EXPECT_THAT(offersFor({"get", "/etc/host"}), testing::IsEmpty());
+    EXPECT_THAT(offersFor({"get", "--json", "/etc/host"}), testing::IsEmpty());
+    EXPECT_THAT(offersFor({"serve", "--port", "/etc/host"}), testing::IsEmpty());
 }
 
 } // namespace
