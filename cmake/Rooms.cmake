@@ -5,7 +5,8 @@
 # compiles each by itself. FILES_APART is for targets whose files use the same names, each for
 # something of its own.
 
-# sensor_profile_room(NAME [FILES_APART] SOURCES ... [USES public libraries ...] [PRIVATELY private libraries ...])
+# sensor_profile_room(NAME [FILES_APART] SOURCES ... [USES public libraries ...]
+#                     [PRIVATELY private libraries ...])
 function(sensor_profile_room name)
   cmake_parse_arguments(room "FILES_APART" "" "SOURCES;USES;PRIVATELY" ${ARGN})
   add_library(${name} STATIC ${room_SOURCES})
@@ -29,8 +30,9 @@ function(sensor_profile_test name)
   endif()
   add_test(NAME ${name} COMMAND ${name})
   # The settings of the person who runs the tests must not reach them.
+  set(environment VORN_INSTRUMENTATION= RYNLOG_LOG=off RYNLOG_TRACE=off LC_ALL=C.UTF-8)
   set_tests_properties(${name} PROPERTIES
-    ENVIRONMENT "VORN_INSTRUMENTATION=;RYNLOG_LOG=off;RYNLOG_TRACE=off;LC_ALL=C.UTF-8;${test_ENVIRONMENT}"
+    ENVIRONMENT "${environment};${test_ENVIRONMENT}"
     TIMEOUT 300)
 endfunction()
 
