@@ -2,7 +2,7 @@
 
 // Clients that keep asking a server of its own process while a chip of the machine comes and goes:
 // every answer is whole and without error, and nothing stays behind in the server.
-// SENSOR_PROFILE_SOAK_SECONDS makes it longer.
+// SENSOR_PROFILE_SOAK_SECONDS says for how long.
 
 #include "platform/utilities/ProviderUtilities.h"
 #include "tests/support/CimCall.h"
@@ -13,6 +13,8 @@
 
 #include <gmock/gmock.h>
 #include <pugixml.hpp>
+
+#include <unistd.h>
 
 #include <atomic>
 #include <chrono>
@@ -88,6 +90,8 @@ protected:
         MountNamespaceTest::SetUp();
         if (IsSkipped() || HasFailure())
             return;
+        // It lasts long enough to run beside all other tests without being in their way.
+        EXPECT_NE(::nice(10), -1);
         sysfs_ = std::make_unique<BoundSysfs>(Testing::sysfsTree("hotplug"));
         // Else the address sanitizer keeps what was freed, up to 256 MB.
         server_ = std::make_unique<ServerProcess>(std::vector<std::string>{"--workers", "4"},
