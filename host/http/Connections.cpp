@@ -17,6 +17,7 @@ namespace {
 
 constexpr std::chrono::milliseconds watchInterval{500};
 constexpr std::chrono::seconds complaintInterval{60};
+constexpr std::chrono::seconds lastPatience{2}; // with a request that comes in at the end
 
 // Whether the client will send no more, and all it sent was read.
 bool hasFallenSilent(int descriptor)
@@ -116,7 +117,8 @@ std::chrono::seconds Connections::patienceIn(Phase phase) const
 {
     switch (phase) {
     case Phase::receiving:
-        return limits_.requestTimeout;
+        return isWindingUp_ ? std::min(limits_.requestTimeout, lastPatience)
+                            : limits_.requestTimeout;
     case Phase::answering:
         return limits_.answerTimeout;
     default:
@@ -146,9 +148,13 @@ void Connections::windUp()
 {
     const std::lock_guard lock(mutex_);
     isWindingUp_ = true;
-    for (const ClientConnection& connection : all_)
+    const auto latest = Clock::now() + patienceIn(Phase::receiving);
+    for (ClientConnection& connection : all_) {
         if (connection.phase == Phase::idle)
             ::shutdown(connection.descriptor, SHUT_RD);
+        if (connection.phase == Phase::receiving)
+            connection.deadline = std::min(connection.deadline, latest);
+    }
 }
 
 bool Connections::isWindingUp() const

@@ -40,7 +40,7 @@ public:
     void awake();
 
     // From now on no connection is kept for a further request; those without one end now, the
-    // others with theirs.
+    // others with theirs, or soon where it does not come in.
     void windUp();
     bool isWindingUp() const;
     // Waits until no request is at work, at most so long; whether that is so then.
@@ -53,10 +53,10 @@ public:
 private:
     using Clock = std::chrono::steady_clock;
 
-    std::chrono::seconds patienceIn(Phase phase) const;
     void closeOverdue();
 
     // REQUIRES: the mutex is held.
+    std::chrono::seconds patienceIn(Phase phase) const;
     bool hasRoomFor(const Address& client, const std::string& neighbourhood);
     void complain(const Address& client, bool areTooMany);
     void watch();

@@ -83,7 +83,7 @@ void Exchange::tryPasswordAt(
         if (time <= std::chrono::steady_clock::now())
             hand();
         else
-            service_.timer.at(time, hand);
+            service_.timer.atOrSooner(time, hand);
     } catch (...) {
         isLost_ = true;
         wakeUp();
@@ -110,7 +110,7 @@ void Exchange::tryPassword(const Credentials& credentials)
         if (!refusal)
             return wakeUp();
         error_ = unauthorized();
-        service_.timer.at(*refusal, [this] { wakeUp(); });
+        service_.timer.atOrSooner(*refusal, [this] { wakeUp(); });
     } catch (...) {
         isLost_ = true;
         wakeUp();

@@ -75,6 +75,7 @@ public:
         for (Daemon& daemon : daemons_)
             daemon.stopAccepting();
         connections_.windUp();
+        timer_.hurry(); // those who wait for the outcome of their sign-in
     }
 
     Connections& connections() { return connections_; }

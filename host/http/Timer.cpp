@@ -29,15 +29,42 @@ Timer::Timer() : thread_([this] { run(); }) {}
 
 void Timer::at(Time time, std::function<void()> action)
 {
+    add(time, {std::move(action), false});
+}
+
+void Timer::atOrSooner(Time time, std::function<void()> action)
+{
+    add(time, {std::move(action), true});
+}
+
+void Timer::add(Time time, Action action)
+{
     {
         const std::lock_guard lock(mutex_);
         if (!isEnding_) {
-            actions_.emplace(time, std::move(action));
+            actions_.emplace(isHurried_ && action.mayBeSooner ? Time{} : time, std::move(action));
             changed_.notify_all();
             return;
         }
     }
-    perform(action);
+    perform(action.function);
+}
+
+void Timer::hurry()
+{
+    {
+        const std::lock_guard lock(mutex_);
+        isHurried_ = true;
+        for (auto next = actions_.begin(); next != actions_.end();) {
+            const auto action = next++;
+            if (!action->second.mayBeSooner)
+                continue;
+            auto sooner = actions_.extract(action);
+            sooner.key() = Time{};
+            actions_.insert(std::move(sooner));
+        }
+    }
+    changed_.notify_all();
 }
 
 void Timer::end()
@@ -67,7 +94,7 @@ void Timer::run()
             changed_.wait_until(lock, due);
             continue;
         }
-        const auto action = std::move(first->second);
+        const auto action = std::move(first->second.function);
         actions_.erase(first);
         lock.unlock();
         perform(action);

@@ -270,6 +270,24 @@ TEST_F(SignInTest, NewPasswordsCountAtOnce)
     EXPECT_EQ(ask(post(as("Ym9iOnNlY3JldA=="))).status, 200);
 }
 
+TEST_F(SignInTest, ServerThatStopsDoesNotWaitForThoseWhoGuess)
+{
+    limits.signInDelay = 3600s;
+    start();
+    HttpClient guesser = connect();
+    guesser.send(post(wrong));
+    EXPECT_FALSE(guesser.hasReplyWithin(300ms));
+    HttpClient behind = connect();
+    behind.send(post(right));
+    EXPECT_FALSE(behind.hasReplyWithin(100ms));
+    server->stopAccepting();
+    EXPECT_TRUE(server->waitUntilQuiet(8s));
+    EXPECT_EQ(guesser.receive().status, 401);
+    EXPECT_EQ(behind.receive().status, 503);
+    EXPECT_TRUE(guesser.isClosed());
+    EXPECT_TRUE(behind.isClosed());
+}
+
 TEST_F(SignInTest, ServerEndsWhileSomebodyWaitsForARefusal)
 {
     limits.signInDelay = 3600s;

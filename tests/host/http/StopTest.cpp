@@ -9,6 +9,7 @@
 
 #include <condition_variable>
 #include <fcntl.h>
+#include <future>
 
 namespace HttpTests {
 
@@ -59,15 +60,29 @@ TEST_F(StopTest, LargeAnswersAreFetchedToTheirEnd)
     EXPECT_TRUE(client.isClosed()); // though its head was sent when nobody thought of an end
 }
 
-TEST_F(StopTest, SlowSendersEndAsEver)
+TEST_F(StopTest, HalfSentRequestsAreNotWaitedForLong)
 {
-    limits.requestTimeout = 1s;
+    start();
+    HttpClient headless = connect();
+    headless.send(post().substr(0, 200));
+    HttpClient bodyless = connect();
+    bodyless.send(post().substr(0, post().size() - 1));
+    EXPECT_EQ(ask(post()).status, 200); // by now the server has seen the others' beginning
+    server->stopAccepting();
+    EXPECT_TRUE(server->waitUntilQuiet(8s));
+    EXPECT_TRUE(headless.isClosed());
+    EXPECT_TRUE(bodyless.isClosed());
+}
+
+TEST_F(StopTest, RequestThatIsComingInIsCarriedOut)
+{
     start();
     HttpClient client = connect();
     client.send(post().substr(0, 200));
-    EXPECT_EQ(ask(post()).status, 200); // by now the server has seen the other one's beginning
+    EXPECT_EQ(ask(post()).status, 200);
     server->stopAccepting();
-    EXPECT_TRUE(server->waitUntilQuiet(10s));
+    client.send(post().substr(200));
+    EXPECT_EQ(client.receive().status, 200);
     EXPECT_TRUE(client.isClosed());
 }
 
@@ -133,6 +148,25 @@ TEST(TimerTest, DoesThingsInTheirOrderAndAtTheEndAllThatIsLeft)
         timer.at(now + 3600s, [&] { done.push_back(5); });
     }
     EXPECT_EQ(done, (std::vector<int>{1, 2, 3, 4, 5}));
+}
+
+TEST(TimerTest, HurriesWithWhatMayBeSooner)
+{
+    std::vector<int> done;
+    Host::Http::Timer timer;
+    const auto later = std::chrono::steady_clock::now() + 3600s;
+    std::promise<void> last;
+    timer.at(later, [&] { done.push_back(4); });
+    timer.atOrSooner(later, [&] { done.push_back(1); });
+    timer.atOrSooner(later + 1s, [&] { done.push_back(2); });
+    timer.hurry();
+    timer.atOrSooner(later, [&] {
+        done.push_back(3);
+        last.set_value();
+    });
+    EXPECT_EQ(last.get_future().wait_for(10s), std::future_status::ready);
+    timer.end();
+    EXPECT_EQ(done, (std::vector<int>{1, 2, 3, 4}));
 }
 
 TEST(TimerTest, GoesOnWhenSomethingFails)
