@@ -37,22 +37,23 @@ const std::vector<std::string> providerFiles = {"lib/cmpi/libComputerSystemProvi
     "share/locale/en/LC_MESSAGES/sensor-profile.mo",
     "share/locale/es/LC_MESSAGES/sensor-profile.mo",
     "share/locale/fr/LC_MESSAGES/sensor-profile.mo",
-    "share/locale/ja/LC_MESSAGES/sensor-profile.mo", "share/man/man7/sensor-profile.7.gz",
-    "share/man/man8/sensor-profile-register.8.gz", "share/sensor-profile/cim-ancestors.mof",
-    "share/sensor-profile/cim-core.mof", "share/sensor-profile/qualifiers.mof",
-    "share/sensor-profile/register/libraries.sh", "share/sensor-profile/register/openpegasus.sh",
-    "share/sensor-profile/register/sfcb.sh", "share/sensor-profile/register/steps.sh",
+    "share/locale/ja/LC_MESSAGES/sensor-profile.mo", "share/man/man5/sensor-profile-model.5.gz",
+    "share/man/man7/sensor-profile.7.gz", "share/man/man8/sensor-profile-register.8.gz",
+    "share/sensor-profile/cim-ancestors.mof", "share/sensor-profile/cim-core.mof",
+    "share/sensor-profile/qualifiers.mof", "share/sensor-profile/register/libraries.sh",
+    "share/sensor-profile/register/openpegasus.sh", "share/sensor-profile/register/sfcb.sh",
+    "share/sensor-profile/register/steps.sh",
     "share/sensor-profile/registration/sensor-profile-registration.mof",
     "share/sensor-profile/registration/sensor-profile.reg",
     "share/sensor-profile/sensor-profile-computer-system.mof",
+    "share/sensor-profile/sensor-profile-model.schema.json",
     "share/sensor-profile/sensor-profile.mof"};
 
 const std::vector<std::string> toolFiles = {"bin/sensorctl", "etc/sensor-profile/serve.conf",
     "lib/systemd/system/sensor-profile.service", "share/bash-completion/completions/sensorctl",
     "share/doc/sensor-profile/changelog.gz", "share/man/man1/sensorctl.1.gz",
-    "share/man/man5/sensor-profile-model.5.gz", "share/sensor-profile/demo-model.json",
-    "share/sensor-profile/host.mof", "share/sensor-profile/interop.mof",
-    "share/sensor-profile/sensor-profile-model.schema.json"};
+    "share/sensor-profile/demo-model.json", "share/sensor-profile/host.mof",
+    "share/sensor-profile/interop.mof"};
 
 TEST(Installed, areTheProviderAndTheTool)
 {
