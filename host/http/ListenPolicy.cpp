@@ -2,6 +2,7 @@
 
 #include "host/http/ListenPolicy.h"
 
+#include <algorithm>
 #include <stdexcept>
 
 namespace Host::Http {
@@ -21,6 +22,24 @@ void requireProtection(const Address& address, const ListenWishes& wishes)
                                 ", which needs TLS and sign-in; what is missing: " + missing);
 }
 
+// Whether all who can reach the other one reach the first, too.
+bool covers(const Endpoint& first, const Endpoint& other)
+{
+    return first.isEncrypted == other.isEncrypted && first.address.port() == other.address.port() &&
+           first.address.isIpv6() == other.address.isIpv6() &&
+           (first.address.isAny() || first.address.host() == other.address.host());
+}
+
+// Two that cover one another would be in each other's way.
+void add(std::vector<Endpoint>& endpoints, const Endpoint& added)
+{
+    if (std::any_of(endpoints.begin(), endpoints.end(),
+            [&](const Endpoint& each) { return covers(each, added); }))
+        return;
+    std::erase_if(endpoints, [&](const Endpoint& each) { return covers(added, each); });
+    endpoints.push_back(added);
+}
+
 } // namespace
 
 std::vector<Endpoint> endpointsFor(const ListenWishes& wishes)
@@ -33,11 +52,11 @@ std::vector<Endpoint> endpointsFor(const ListenWishes& wishes)
         const Address plain(host, wishes.port);
         const bool isOptional = areDefaults && plain.isIpv6();
         if (plain.isLoopback())
-            endpoints.push_back({plain, false, isOptional});
+            add(endpoints, {plain, false, isOptional});
         else
             requireProtection(plain, wishes);
         if (wishes.hasCertificate)
-            endpoints.push_back({Address(host, wishes.tlsPort), true, isOptional});
+            add(endpoints, {Address(host, wishes.tlsPort), true, isOptional});
     }
     return endpoints;
 }

@@ -28,7 +28,9 @@ struct Endpoint {
 };
 
 // Loopback addresses are served without TLS, and with it too where there is a certificate; all
-// others with TLS only, and only to clients that sign in. Throws std::invalid_argument saying
+// others with TLS only, and only to clients that sign in. None is there twice, nor beside 0.0.0.0
+// or
+// :: that includes it. Throws std::invalid_argument saying
 // what is missing for that, or what is no address.
 std::vector<Endpoint> endpointsFor(const ListenWishes& wishes);
 

@@ -62,6 +62,21 @@ TEST(ListenPolicyTest, OtherAddressesNeedTlsAndPasswords)
     }
 }
 
+TEST(ListenPolicyTest, NoPlaceIsTakenTwice)
+{
+    EXPECT_THAT(placesFor({.addresses = {"127.0.0.1", "::1", "127.0.0.1", "0:0::1"}}),
+        ElementsAre("127.0.0.1:5988", "[::1]:5988"));
+    const auto protectedPlacesFor = [](const std::vector<std::string>& addresses) {
+        return placesFor({.addresses = addresses, .hasCertificate = true, .hasPasswords = true});
+    };
+    EXPECT_THAT(protectedPlacesFor({"0.0.0.0", "127.0.0.1"}),
+        ElementsAre("0.0.0.0:5989 tls", "127.0.0.1:5988"));
+    EXPECT_THAT(protectedPlacesFor({"127.0.0.1", "::1", "0.0.0.0"}),
+        ElementsAre("127.0.0.1:5988", "[::1]:5988", "[::1]:5989 tls", "0.0.0.0:5989 tls"));
+    EXPECT_THAT(protectedPlacesFor({"::", "127.0.0.1", "2001:db8::1"}),
+        ElementsAre("[::]:5989 tls", "127.0.0.1:5988", "127.0.0.1:5989 tls"));
+}
+
 TEST(ListenPolicyTest, NamesAreNoAddresses)
 {
     for (const std::string address : {"localhost", "", "127.0.0.1:80", "[::1]", "example.org"})
