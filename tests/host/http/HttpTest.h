@@ -17,10 +17,12 @@
 #include <gtest/gtest.h>
 
 #include <atomic>
+#include <chrono>
 #include <functional>
 #include <memory>
 #include <mutex>
 #include <string>
+#include <thread>
 #include <vector>
 
 namespace HttpTests {
@@ -136,6 +138,15 @@ protected:
         HttpClient client = connect();
         client.send(request);
         return client.receive();
+    }
+
+    // Soon.
+    void expectNoAnswerAlive() const
+    {
+        const auto end = std::chrono::steady_clock::now() + HttpClient::patience;
+        while (operations.answersAlive != 0 && std::chrono::steady_clock::now() < end)
+            std::this_thread::sleep_for(std::chrono::milliseconds(50));
+        EXPECT_EQ(operations.answersAlive, 0);
     }
 
     StubOperations operations;
