@@ -38,7 +38,7 @@ Request split(std::string_view text)
     const std::size_t second = first.find(' ', space + 1);
     request.head.method = first.substr(0, space);
     if (space != std::string_view::npos)
-        request.head.path = first.substr(space + 1, second - space - 1);
+        request.head.target = first.substr(space + 1, second - space - 1);
     request.head.version = second == std::string_view::npos ? "HTTP/1.1" : first.substr(second + 1);
     for (std::string_view line = next(); !line.empty(); line = next()) {
         const std::size_t colon = line.find(':');

@@ -2,6 +2,7 @@
 
 #include "host/http/BasicCredentials.h"
 
+#include "host/broker/Names.h"
 #include "host/http/RequestHead.h"
 
 #include <cstddef>
@@ -46,7 +47,7 @@ std::optional<Credentials> basicCredentials(std::string_view authorization)
 {
     const std::size_t schemeEnd = authorization.find(' ');
     if (schemeEnd == std::string_view::npos ||
-        !equalIgnoringCase(authorization.substr(0, schemeEnd), "Basic"))
+        !equalNames(authorization.substr(0, schemeEnd), "Basic"))
         return std::nullopt;
     const auto text = fromBase64(withoutBlanks(authorization.substr(schemeEnd)));
     if (!text || text->find('\0') != std::string::npos)

@@ -8,8 +8,11 @@
 #include "host/http/EventLog.h"
 
 #include <gnutls/gnutls.h>
+#include <sys/socket.h>
 
+#include <algorithm>
 #include <array>
+#include <cstddef>
 #include <cstdio>
 #include <memory>
 #include <new>
@@ -19,6 +22,10 @@
 namespace Host::Http::Callbacks {
 
 namespace {
+
+// Of a query, which nobody here asks for. The library keeps each in the memory for the head, and
+// where that is used up neither answers nor ends the connection.
+constexpr std::ptrdiff_t maximumArguments = 100;
 
 const Daemon& daemonOf(const void* closure)
 {
@@ -69,9 +76,9 @@ MHD_Result addField(void* head, MHD_ValueKind, const char* name, std::size_t nam
 }
 
 RequestHead headOf(
-    MHD_Connection* connection, const char* url, const char* method, const char* version)
+    MHD_Connection* connection, const std::string& target, const char* method, const char* version)
 {
-    RequestHead head{method, url, version, {}};
+    RequestHead head{method, target, version, {}};
     const int count = ::MHD_get_connection_values_n(connection, MHD_HEADER_KIND, nullptr, nullptr);
     head.fields.reserve(static_cast<std::size_t>(count));
     if (::MHD_get_connection_values_n(connection, MHD_HEADER_KIND, &addField, &head) != count)
@@ -105,15 +112,30 @@ void connectionChanged(void* daemon, MHD_Connection* connection, void** client,
     }
 }
 
-void* requestBegins(void* daemon, const char*, MHD_Connection* connection) noexcept
+void* requestBegins(void* daemon, const char* uri, MHD_Connection* connection) noexcept
 {
-    if (ClientConnection* const client = clientOf(connection))
-        daemonOf(daemon).service().connections.enter(*client, Phase::receiving);
+    ClientConnection* const client = clientOf(connection);
+    if (client == nullptr)
+        return nullptr;
+    daemonOf(daemon).service().connections.enter(*client, Phase::receiving);
+    client->target.clear();
+    try {
+        const std::string_view target = uri == nullptr ? "" : uri;
+        if (std::count(target.begin(), target.end(), '&') < maximumArguments) {
+            client->target = target;
+            return nullptr;
+        }
+        mention({"requestBegins", "Callbacks", __LINE__},
+            "a request from " + client->address + " has too many arguments");
+    } catch (...) {
+        report({"requestBegins", "Callbacks", __LINE__}, "no memory for a request");
+    }
+    ::shutdown(client->descriptor, SHUT_RDWR);
     return nullptr;
 }
 
-MHD_Result requestGoesOn(void* daemon, MHD_Connection* connection, const char* url,
-    const char* method, const char* version, const char* piece, std::size_t* size, void**) noexcept
+MHD_Result requestGoesOn(void* daemon, MHD_Connection* connection, const char*, const char* method,
+    const char* version, const char* piece, std::size_t* size, void**) noexcept
 {
     ClientConnection* const client = clientOf(connection);
     if (client == nullptr)
@@ -122,7 +144,7 @@ MHD_Result requestGoesOn(void* daemon, MHD_Connection* connection, const char* u
         if (!client->exchange) {
             client->exchange.emplace(daemonOf(daemon).service(), *client, *connection);
             const bool isWell = client->exchange->begin(
-                headOf(connection, url, method, version), headSizeOf(connection));
+                headOf(connection, client->target, method, version), headSizeOf(connection));
             return isWell ? MHD_YES : MHD_NO;
         }
         const std::string_view bytes(piece, *size);

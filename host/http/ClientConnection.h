@@ -40,6 +40,7 @@ struct ClientConnection {
     std::chrono::steady_clock::time_point deadline{};
 
     // Of the thread that serves the connection.
+    std::string target; // of the request that comes in
     std::optional<Exchange> exchange;
 };
 

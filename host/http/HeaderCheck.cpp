@@ -2,6 +2,7 @@
 
 #include "host/http/HeaderCheck.h"
 
+#include "host/broker/Names.h"
 #include "host/cimxml/Message.h"
 #include "host/http/MandatoryExtension.h"
 #include "host/http/MediaType.h"
@@ -23,7 +24,8 @@ bool isControl(char c)
 }
 
 // What others may read otherwise: a name with a blank as the same without, a carriage return in
-// a value as its end.
+// a value as its end. A zero is seen here only where no HTTP library was before: to it that is the
+// end of the value, and it hands on no more.
 void checkFields(const RequestHead& head)
 {
     for (const HeaderField& field : head.fields) {
@@ -31,8 +33,8 @@ void checkFields(const RequestHead& head)
             throw HttpError::closing(
                 Status::badRequest, "the name of a header field holds a character it must not");
         if (std::any_of(field.value.begin(), field.value.end(), isControl))
-            throw HttpError::closing(
-                Status::badRequest, "the header field " + field.name + " holds a control character");
+            throw HttpError::closing(Status::badRequest,
+                "the header field " + field.name + " holds a control character");
     }
 }
 
@@ -40,38 +42,6 @@ void checkHost(const RequestHead& head)
 {
     if (!head.find("Host") && head.version != "HTTP/1.0")
         throw HttpError::closing(Status::badRequest, "the header field Host is missing");
-}
-
-void checkPathAndMethod(const RequestHead& head)
-{
-    if (head.path != "/cimom" && head.path != "/")
-        throw HttpError(Status::notFound, "requests go to /cimom");
-    if (head.method != "POST" && head.method != "M-POST")
-        throw HttpError(Status::methodNotAllowed, "requests are made by POST or M-POST", {},
-            {{"Allow", "POST, M-POST"}});
-}
-
-void checkContent(const RequestHead& head)
-{
-    const auto type = head.find("Content-Type");
-    if (!type || !isXmlInUtf8(*type))
-        throw HttpError(Status::unsupportedMediaType,
-            "the Content-Type must be application/xml or text/xml, in utf-8");
-    const auto coding = head.find("Content-Encoding");
-    if (coding && !equalIgnoringCase(*coding, "identity"))
-        throw HttpError(Status::unsupportedMediaType, "the body must not be compressed");
-}
-
-void checkOperation(const RequestHead& head, const std::string& prefix)
-{
-    const auto operation = head.find(prefix + "CIMOperation");
-    if (!operation || !equalIgnoringCase(*operation, "MethodCall"))
-        throw HttpError(Status::badRequest, "the header field CIMOperation must be MethodCall",
-            "unsupported-operation");
-    const auto version = head.find(prefix + "CIMProtocolVersion");
-    if (version && !version->starts_with("1."))
-        throw HttpError(Status::notImplemented, "the CIMProtocolVersion must be 1.x",
-            "unsupported-protocol-version");
 }
 
 // What two hexadecimal digits say.
@@ -85,8 +55,8 @@ std::optional<char> octet(std::string_view digits)
     return static_cast<char>(value);
 }
 
-// With the octets that stand behind percent signs.
-std::string decoded(std::string_view text, const std::string& name)
+// With the octets that stand behind percent signs; nothing where one has no two digits.
+std::optional<std::string> decoded(std::string_view text)
 {
     std::string result;
     for (std::size_t i = 0; i < text.size(); ++i) {
@@ -96,12 +66,64 @@ std::string decoded(std::string_view text, const std::string& name)
         }
         const auto hidden = octet(text.substr(i + 1, 2));
         if (!hidden)
-            throw HttpError(Status::badRequest,
-                "the header field " + name + " holds a percent sign without two digits", mismatch);
+            return std::nullopt;
         result += *hidden;
         i += 2;
     }
     return result;
+}
+
+// Without query, and without scheme and host where the target names them, as it does for proxies.
+std::string_view pathIn(std::string_view target)
+{
+    const std::size_t schemeEnd = target.find("://");
+    const std::string_view scheme = target.substr(0, schemeEnd);
+    if (schemeEnd != std::string_view::npos &&
+        (equalNames(scheme, "http") || equalNames(scheme, "https"))) {
+        target.remove_prefix(schemeEnd + 3);
+        const std::size_t hostEnd = std::min(target.find_first_of("/?"), target.size());
+        if (hostEnd == 0)
+            return {};
+        target.remove_prefix(hostEnd);
+        if (!target.starts_with('/'))
+            return "/";
+    }
+    return target.substr(0, target.find('?'));
+}
+
+void checkTargetAndMethod(const RequestHead& head)
+{
+    const bool isPost = head.method == "POST" || head.method == "M-POST";
+    const bool isForTheWholeServer = head.target == "*" && !isPost;
+    const auto path = decoded(pathIn(head.target));
+    if (!isForTheWholeServer && path != "/cimom" && path != "/")
+        throw HttpError(Status::notFound, "requests go to /cimom");
+    if (!isPost)
+        throw HttpError(Status::methodNotAllowed, "requests are made by POST or M-POST", {},
+            {{"Allow", "POST, M-POST"}});
+}
+
+void checkContent(const RequestHead& head)
+{
+    const auto type = head.find("Content-Type");
+    if (!type || !isXmlInUtf8(*type))
+        throw HttpError(Status::unsupportedMediaType,
+            "the Content-Type must be application/xml or text/xml, in utf-8");
+    const auto coding = head.find("Content-Encoding");
+    if (coding && !equalNames(*coding, "identity"))
+        throw HttpError(Status::unsupportedMediaType, "the body must not be compressed");
+}
+
+void checkOperation(const RequestHead& head, const std::string& prefix)
+{
+    const auto operation = head.find(prefix + "CIMOperation");
+    if (!operation || !equalNames(*operation, "MethodCall"))
+        throw HttpError(Status::badRequest, "the header field CIMOperation must be MethodCall",
+            "unsupported-operation");
+    const auto version = head.find(prefix + "CIMProtocolVersion");
+    if (version && !version->starts_with("1."))
+        throw HttpError(Status::notImplemented, "the CIMProtocolVersion must be 1.x",
+            "unsupported-protocol-version");
 }
 
 std::optional<std::string> findDecoded(const RequestHead& head, const std::string& name)
@@ -109,7 +131,11 @@ std::optional<std::string> findDecoded(const RequestHead& head, const std::strin
     const auto value = head.find(name);
     if (!value)
         return std::nullopt;
-    return decoded(*value, name);
+    auto text = decoded(*value);
+    if (!text)
+        throw HttpError(Status::badRequest,
+            "the header field " + name + " holds a percent sign without two digits", mismatch);
+    return text;
 }
 
 // Of a path with or without host, class and keys.
@@ -134,14 +160,14 @@ BodySize bodySizeOf(const RequestHead& head)
     checkFields(head);
     BodySize body;
     if (const auto expectation = head.find("Expect")) {
-        if (!equalIgnoringCase(*expectation, "100-continue"))
+        if (!equalNames(*expectation, "100-continue"))
             throw HttpError::closing(
                 Status::expectationFailed, "the only expectation met is 100-continue");
         body.isAwaited = true;
     }
     const auto length = head.find("Content-Length");
     if (const auto coding = head.find("Transfer-Encoding")) {
-        if (!equalIgnoringCase(*coding, "chunked"))
+        if (!equalNames(*coding, "chunked"))
             throw HttpError::closing(
                 Status::notImplemented, "the only Transfer-Encoding is chunked");
         if (length)
@@ -166,7 +192,7 @@ BodySize bodySizeOf(const RequestHead& head)
 CallHead checkHead(const RequestHead& head, const BodySize& body, const Limits& limits)
 {
     checkHost(head);
-    checkPathAndMethod(head);
+    checkTargetAndMethod(head);
     CallHead call;
     if (head.method == "M-POST")
         call.extension = mandatoryExtensionOf(head);
@@ -194,9 +220,9 @@ void requireMatch(const CallHead& head, const CimXml::Message& message)
         refuse("the header field CIMMethod is missing");
     if (!head.object)
         refuse("the header field CIMObject is missing");
-    if (!equalIgnoringCase(*head.method, message.methodName()))
+    if (!equalNames(*head.method, message.methodName()))
         refuse("CIMMethod is " + *head.method + ", but the body calls " + message.methodName());
-    if (!equalIgnoringCase(nameSpaceIn(*head.object), message.nameSpace()))
+    if (!equalNames(nameSpaceIn(*head.object), message.nameSpace()))
         refuse("CIMObject is " + *head.object + ", but the body is for " + message.nameSpace());
 }
 

@@ -2,6 +2,7 @@
 
 #include "host/http/MandatoryExtension.h"
 
+#include "host/broker/Names.h"
 #include "host/http/RequestHead.h"
 
 #include <algorithm>
@@ -26,17 +27,14 @@ std::string mandatoryExtensionOf(const RequestHead& head)
     if (!declared)
         throw HttpError(Status::badRequest, "an M-POST must have the header field Man");
     const std::size_t end = declared->find(';');
-    std::string_view identifier = withoutBlanks(declared->substr(0, end));
-    if (identifier.size() >= 2 && identifier.starts_with('"') && identifier.ends_with('"'))
-        identifier = identifier.substr(1, identifier.size() - 2);
-    if (identifier != mandatoryExtension)
+    if (withoutQuotes(withoutBlanks(declared->substr(0, end))) != mandatoryExtension)
         throw HttpError(Status::notExtended,
             "the only mandatory extension is " + std::string(mandatoryExtension));
     const std::string_view parameter =
         end == std::string_view::npos ? "" : withoutBlanks(declared->substr(end + 1));
     const std::size_t equals = parameter.find('=');
     if (equals != std::string_view::npos &&
-        equalIgnoringCase(withoutBlanks(parameter.substr(0, equals)), "ns")) {
+        equalNames(withoutBlanks(parameter.substr(0, equals)), "ns")) {
         const std::string_view prefix = withoutBlanks(parameter.substr(equals + 1));
         if (isPrefix(prefix))
             return std::string(prefix);

@@ -2,32 +2,19 @@
 
 #include "host/http/RequestHead.h"
 
+#include "host/broker/Names.h"
+
 #include <algorithm>
 
 namespace Host::Http {
-
-namespace {
-
-constexpr char lowerCase(char c)
-{
-    return c >= 'A' && c <= 'Z' ? static_cast<char>(c - 'A' + 'a') : c;
-}
-
-} // namespace
 
 bool isToken(std::string_view text)
 {
     constexpr std::string_view punctuation = "!#$%&'*+-.^_`|~";
     return !text.empty() && std::all_of(text.begin(), text.end(), [&](char c) {
-        return (c >= '0' && c <= '9') || (lowerCase(c) >= 'a' && lowerCase(c) <= 'z') ||
+        return (c >= '0' && c <= '9') || (foldCase(c) >= 'a' && foldCase(c) <= 'z') ||
                punctuation.find(c) != std::string_view::npos;
     });
-}
-
-bool equalIgnoringCase(std::string_view a, std::string_view b)
-{
-    return std::equal(a.begin(), a.end(), b.begin(), b.end(),
-        [](char one, char other) { return lowerCase(one) == lowerCase(other); });
 }
 
 std::string_view withoutBlanks(std::string_view text)
@@ -38,11 +25,18 @@ std::string_view withoutBlanks(std::string_view text)
     return text.substr(first, text.find_last_not_of(" \t") - first + 1);
 }
 
+std::string_view withoutQuotes(std::string_view text)
+{
+    if (text.size() >= 2 && text.starts_with('"') && text.ends_with('"'))
+        return text.substr(1, text.size() - 2);
+    return text;
+}
+
 std::optional<std::string_view> RequestHead::find(std::string_view name) const
 {
     std::optional<std::string_view> value;
     for (const HeaderField& field : fields) {
-        if (!equalIgnoringCase(field.name, name))
+        if (!equalNames(field.name, name))
             continue;
         if (value)
             throw HttpError::closing(

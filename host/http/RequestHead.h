@@ -15,7 +15,7 @@ namespace Host::Http {
 
 struct RequestHead {
     std::string method;
-    std::string path;    // without query
+    std::string target;  // as the client spells it, such as /cimom
     std::string version; // such as HTTP/1.1
     std::vector<HeaderField> fields;
 
@@ -27,9 +27,10 @@ struct RequestHead {
 // Whether the text can be the name of a header field.
 bool isToken(std::string_view text);
 
-bool equalIgnoringCase(std::string_view a, std::string_view b);
-
 // Without spaces and tabs at its ends.
 std::string_view withoutBlanks(std::string_view text);
+
+// Without the quotation marks, where there is one at each end.
+std::string_view withoutQuotes(std::string_view text);
 
 } // namespace Host::Http

@@ -47,10 +47,10 @@ CallHead check(const RequestHead& head)
 
 // "ok", or the status with the CIMError.
 std::string verdict(const Fields& fields, const std::string& method = "POST",
-    const std::string& path = "/cimom", const std::string& version = "HTTP/1.1")
+    const std::string& target = "/cimom", const std::string& version = "HTTP/1.1")
 {
     try {
-        check({method, path, version, fields});
+        check({method, target, version, fields});
         return "ok";
     } catch (const HttpError& error) {
         return std::to_string(error.status()) + (error.cimError().empty() ? "" : " ") +
@@ -84,9 +84,16 @@ TEST(HeaderCheckTest, TakesWhatIsInOrder)
 
 TEST(HeaderCheckTest, KnowsTwoPathsAndTwoMethods)
 {
-    EXPECT_EQ(verdict(usual, "POST", "/cimom/"), "404");
-    EXPECT_EQ(verdict(usual, "POST", "/etc/passwd"), "404");
-    EXPECT_EQ(verdict(usual, "POST", "*"), "404");
+    for (const std::string target :
+        {"/cimom?", "/cimom?x=/", "/?", "/%63imom", "http://host/cimom", "https://host:5989/cimom",
+            "HTTP://[::1]/", "http://host", "http://host?x", "http://u@host/cimom?a://b"})
+        EXPECT_EQ(verdict(usual, "POST", target), "ok") << target;
+    for (const std::string target :
+        {"/cimom/", "/etc/passwd", "*", "", "cimom", "?", "/cimom%00", "/cimom%00x", "/cimom%",
+            "/cimom%6", "/%zz", "http:///cimom", "http://", "ftp://host/cimom", "host/cimom",
+            "/x://host/cimom", "http://host/cimom/", "http://host/http://host/cimom"})
+        EXPECT_EQ(verdict(usual, "POST", target), "404") << target;
+    EXPECT_EQ(verdict(usual, "OPTIONS", "*"), "405");
     for (const std::string method : {"GET", "HEAD", "PUT", "DELETE", "OPTIONS", "post", "M-GET"})
         EXPECT_EQ(verdict(usual, method), "405") << method;
 }
