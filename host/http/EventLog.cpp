@@ -2,7 +2,13 @@
 
 #include "host/http/EventLog.h"
 
+#include "host/cimxml/Characters.h"
 #include "platform/logging/RynLogger.h"
+
+#include <algorithm>
+#include <array>
+#include <cstdio>
+#include <string_view>
 
 namespace Host::Http {
 
@@ -11,13 +17,60 @@ namespace {
 constexpr int levelOfMessages = 6000;
 constexpr int levelOfDetails = 4000;
 
+struct Range {
+    char32_t first;
+    char32_t last;
+};
+
+// The log itself escapes those of ASCII.
+constexpr std::array<Range, 9> unseen{{
+    {0x80, 0x9F},       // control characters
+    {0xAD, 0xAD},       // the hyphen that is shown at the end of a line
+    {0x61C, 0x61C},     // a mark of direction
+    {0x200B, 0x200F},   // without width, and marks of direction
+    {0x2028, 0x202E},   // ends of lines, and changes of direction
+    {0x2060, 0x206F},   // without width, and changes of direction
+    {0xFEFF, 0xFEFF},   // the byte order mark
+    {0xFFF9, 0xFFFB},   // annotations
+    {0xE0000, 0xE007F}, // tags
+}};
+
+bool isUnseen(char32_t code)
+{
+    return std::any_of(unseen.begin(), unseen.end(),
+        [code](const Range& range) { return code >= range.first && code <= range.last; });
+}
+
+void appendNumber(std::string& line, const char* format, unsigned number)
+{
+    std::array<char, 16> text{};
+    std::snprintf(text.data(), text.size(), format, number);
+    line += text.data();
+}
+
+std::string legible(std::string_view text)
+{
+    std::string line;
+    while (!text.empty()) {
+        const auto next = CimXml::firstCharacter(text);
+        if (!next.isValid)
+            appendNumber(line, "<0x%02X>", static_cast<unsigned char>(text.front()));
+        else if (isUnseen(next.code))
+            appendNumber(line, "<U+%04X>", static_cast<unsigned>(next.code));
+        else
+            line += text.substr(0, next.size);
+        text.remove_prefix(next.size);
+    }
+    return line;
+}
+
 void writeLine(const Place& place, int level, const std::string& text) noexcept
 {
     try {
         RynLog::RynLogger::logLevelMessage(
-            place.function, place.file, place.line, "Http", level, nullptr, 0, 0, text);
+            place.function, place.file, place.line, "Http", level, nullptr, 0, 0, legible(text));
     } catch (...) {
-        // No memory for the component's name: the line is lost.
+        // No memory for its texts: the line is lost.
         return;
     }
 }
@@ -31,8 +84,13 @@ void report(const Place& place, const std::string& text) noexcept
 
 void mention(const Place& place, const std::string& text) noexcept
 {
-    if (RynLog::RynLogger::isWanted(levelOfDetails))
+    if (isMentionWanted())
         writeLine(place, levelOfDetails, text);
+}
+
+bool isMentionWanted() noexcept
+{
+    return RynLog::RynLogger::isWanted(levelOfDetails);
 }
 
 std::string logProblem() noexcept

@@ -64,7 +64,7 @@ void Exchange::signIn(const RequestHead& head)
         throw unauthorized();
     caller_.principal = credentials->user;
     const auto now = std::chrono::steady_clock::now();
-    if (service_.signIns.isKnown(*credentials, now))
+    if (service_.signIns.isKnown(*credentials, client_.address, now))
         return;
     if (!service_.connections.mayFallAsleep())
         throw overloaded();
@@ -211,10 +211,14 @@ void Exchange::work() noexcept
 
 void Exchange::carryOut()
 {
-    const CimXml::Message message(body_, service_.limits.maximumDepth);
-    body_ = {};
-    requireMatch(head_, message);
-    answer_.begin(service_.operations.answer(message, caller_), service_.unsent);
+    // The message goes before the answer, which may give back the memory of both.
+    const auto answer = [this] {
+        const CimXml::Message message(body_, service_.limits.maximumDepth);
+        body_ = {};
+        requireMatch(head_, message);
+        return service_.operations.answer(message, caller_);
+    };
+    answer_.begin(answer(), service_.unsent);
 }
 
 void Exchange::fallAsleep(State state)
@@ -253,9 +257,7 @@ bool Exchange::sendAnswer()
         response.add(field);
     if (service_.connections.isWindingUp())
         response.endConnection();
-    state_ = State::answered;
-    service_.connections.enter(client_, Phase::answering);
-    return response.queue(connection_, Status::ok);
+    return send(response, Status::ok);
 }
 
 bool Exchange::sendError()
@@ -269,11 +271,32 @@ bool Exchange::sendError()
         response.add(field);
     if (error_->endsConnection() || service_.connections.isWindingUp())
         response.endConnection();
-    mention({"sendError", "Exchange", __LINE__},
-        std::to_string(error_->status()) + " to " + client_.address + ": " + error_->what());
+    return send(response, error_->status());
+}
+
+bool Exchange::send(Response& response, unsigned status)
+{
+    if (isMentionWanted())
+        mention({"send", "Exchange", __LINE__}, summary(status));
     state_ = State::answered;
     service_.connections.enter(client_, Phase::answering);
-    return response.queue(connection_, error_->status());
+    return response.queue(connection_, status);
+}
+
+// Whom the answer goes to, and what it is about. The name is one that the client was let in with,
+// but for errors that say otherwise.
+std::string Exchange::summary(unsigned status) const
+{
+    std::string text = std::to_string(status) + " to " + client_.address;
+    if (!caller_.principal.empty())
+        text += ", \"" + caller_.principal + "\"";
+    if (head_.method)
+        text += ", " + *head_.method;
+    if (head_.object)
+        text += " in " + *head_.object;
+    if (error_)
+        text += std::string(": ") + error_->what();
+    return text;
 }
 
 } // namespace Host::Http

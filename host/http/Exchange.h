@@ -22,6 +22,7 @@ struct MHD_Connection;
 namespace Host::Http {
 
 class Connections;
+class Response;
 class SignIns;
 class Timer;
 class WorkerPool;
@@ -79,6 +80,8 @@ private:
 
     bool sendAnswer();
     bool sendError();
+    bool send(Response& response, unsigned status);
+    std::string summary(unsigned status) const;
 
     Service& service_;
     ClientConnection& client_;

@@ -7,7 +7,6 @@
 
 #include <algorithm>
 #include <stdexcept>
-#include <string>
 
 namespace Host::Http {
 
@@ -17,21 +16,21 @@ SignInMemory::SignInMemory()
         throw std::runtime_error("the system gives no random numbers");
 }
 
-bool SignInMemory::knows(const Credentials& credentials, Time now)
+bool SignInMemory::knows(const Credentials& credentials, const std::string& address, Time now)
 {
     const std::lock_guard lock(mutex_);
-    const auto found = until_.find(digestOf(credentials));
+    const auto found = until_.find(digestOf(credentials, address));
     return found != until_.end() && now < found->second;
 }
 
-void SignInMemory::remember(const Credentials& credentials, Time now)
+bool SignInMemory::remember(const Credentials& credentials, const std::string& address, Time now)
 {
     const std::lock_guard lock(mutex_);
     std::erase_if(until_, [now](const auto& each) { return each.second <= now; });
     if (until_.size() >= capacity)
         until_.erase(std::min_element(until_.begin(), until_.end(),
             [](const auto& one, const auto& other) { return one.second < other.second; }));
-    until_[digestOf(credentials)] = now + lifetime;
+    return until_.insert_or_assign(digestOf(credentials, address), now + lifetime).second;
 }
 
 void SignInMemory::forgetAll()
@@ -40,10 +39,11 @@ void SignInMemory::forgetAll()
     until_.clear();
 }
 
-SignInMemory::Digest SignInMemory::digestOf(const Credentials& credentials) const
+SignInMemory::Digest SignInMemory::digestOf(
+    const Credentials& credentials, const std::string& address) const
 {
-    // Neither part holds a zero.
-    const std::string text = credentials.user + '\0' + credentials.password;
+    // No part holds a zero.
+    const std::string text = credentials.user + '\0' + credentials.password + '\0' + address;
     Digest digest{};
     if (::gnutls_hmac_fast(GNUTLS_MAC_SHA256, key_.data(), key_.size(), text.data(), text.size(),
             digest.data()) != 0)

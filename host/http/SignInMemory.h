@@ -12,10 +12,13 @@
 #include <cstdint>
 #include <map>
 #include <mutex>
+#include <string>
 
 namespace Host::Http {
 
-// Keeps no password: only a hash under a key that lives in this process's memory. Thread-safe.
+// Keeps no password: only a hash under a key that lives in this process's memory. What is known of
+// one address says nothing of others, so that whoever comes from elsewhere is told to the log, too.
+// Thread-safe.
 class SignInMemory {
 public:
     using Time = std::chrono::steady_clock::time_point;
@@ -26,15 +29,16 @@ public:
     // Throws std::runtime_error when there is no randomness for a key.
     SignInMemory();
 
-    bool knows(const Credentials& credentials, Time now);
-    void remember(const Credentials& credentials, Time now);
+    bool knows(const Credentials& credentials, const std::string& address, Time now);
+    // Whether they were not known.
+    bool remember(const Credentials& credentials, const std::string& address, Time now);
     void forgetAll();
 
 private:
     using Digest = std::array<std::uint8_t, 32>;
 
     // REQUIRES: the mutex is held.
-    Digest digestOf(const Credentials& credentials) const;
+    Digest digestOf(const Credentials& credentials, const std::string& address) const;
 
     std::mutex mutex_;
     std::array<std::uint8_t, 32> key_{};

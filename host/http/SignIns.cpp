@@ -31,11 +31,18 @@ std::optional<SignIns::Time> SignIns::tryPassword(const Credentials& credentials
             "wrong password for \"" + credentials.user + "\" from " + address);
         return delays_.failed(neighbourhood, now);
     }
-    // Not when the passwords have changed meanwhile.
-    const std::lock_guard lock(mutex_);
-    if (passwords_ == current)
-        memory_.remember(credentials, std::chrono::steady_clock::now());
+    if (remember(credentials, address, current))
+        report({"tryPassword", "SignIns", __LINE__},
+            "\"" + credentials.user + "\" signed in from " + address);
     return std::nullopt;
+}
+
+bool SignIns::remember(const Credentials& credentials, const std::string& address,
+    const std::shared_ptr<const Passwords>& tried)
+{
+    const std::lock_guard lock(mutex_);
+    return passwords_ != tried ||
+           memory_.remember(credentials, address, std::chrono::steady_clock::now());
 }
 
 std::shared_ptr<const Passwords> SignIns::passwords() const

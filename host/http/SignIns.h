@@ -30,10 +30,10 @@ public:
     // Who signed in before must do so again.
     void replacePasswords(std::shared_ptr<const Passwords> passwords);
 
-    // Quick. A client that signed in lately.
-    bool isKnown(const Credentials& credentials, Time now)
+    // Quick. Who signed in lately from this address.
+    bool isKnown(const Credentials& credentials, const std::string& address, Time now)
     {
-        return memory_.knows(credentials, now);
+        return memory_.knows(credentials, address, now);
     }
     // When a password from the neighbourhood may be tried.
     Time admission(const std::string& neighbourhood, Time now)
@@ -45,13 +45,18 @@ public:
     {
         return delays_.admit(neighbourhood, now);
     }
-    // Takes long. Nothing when the password is right; for a wrong one, which goes to the log with
-    // the address, when the client may hear of it. That is counted from now, the beginning, so
-    // that it does not tell how long the user's hash took. REQUIRES: areDemanded().
+    // Takes long. Nothing when the password is right; for a wrong one, when the client may hear of
+    // it. Both go to the log with the address, the right one when it was not known. The time is
+    // counted from now, the beginning, so that it does not tell how long the user's hash took.
+    // REQUIRES: areDemanded().
     std::optional<Time> tryPassword(const Credentials& credentials, const std::string& address,
         const std::string& neighbourhood, Time now);
 
 private:
+    // Whether they were not known. Does not remember them when the passwords have changed
+    // meanwhile.
+    bool remember(const Credentials& credentials, const std::string& address,
+        const std::shared_ptr<const Passwords>& tried);
     std::shared_ptr<const Passwords> passwords() const;
 
     mutable std::mutex mutex_;

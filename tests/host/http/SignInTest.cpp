@@ -1,9 +1,7 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Who may go on.
+// Who may go on, over sockets.
 
-#include "host/http/BasicCredentials.h"
-#include "host/http/SignIns.h"
 #include "tests/host/http/Hashes.h"
 #include "tests/host/http/HttpTest.h"
 #include "tests/support/LogCapture.h"
@@ -13,100 +11,14 @@ namespace HttpTests {
 namespace {
 
 using Host::Http::Passwords;
-using Host::Http::SignInDelays;
-using Host::Http::SignInMemory;
 using namespace std::chrono_literals;
 
-TEST(BasicCredentialsTest, AreReadFromTheirEncoding)
+std::vector<std::string> textsIn(const Testing::LogCapture& log)
 {
-    const auto user = [](const std::string& field) {
-        const auto found = Host::Http::basicCredentials(field);
-        return found ? found->user + "|" + found->password : "none";
-    };
-    EXPECT_EQ(user("Basic YW5uOnNlY3JldA=="), "ann|secret");
-    EXPECT_EQ(user("bAsIc   YW5uOnNlY3JldA=="), "ann|secret");
-    EXPECT_EQ(user("Basic YW5uOg=="), "ann|");
-    EXPECT_EQ(user("Basic YW5uOmE6Yg=="), "ann|a:b");
-    EXPECT_EQ(user("Basic w6TDtjrDvA=="), "äö|ü");
-    for (const std::string field : {"", "Basic", "Basic ",
-             "YW5uOnNlY3JldA==", "Digest YW5uOnNlY3JldA==", "Basic YW5uOnNlY3JldA",
-             "Basic YW5uOnNlY3JldA=", "Basic YW5u",
-             "Basic OnNlY3JldA==", "Basic YW5uAHg6eA==", "Basic ====", "Basic YW5uOnNl*3JldA=="})
-        EXPECT_EQ(user(field), "none") << field;
-}
-
-TEST(SignInMemoryTest, ForgetsInTimeAndWhenThereAreTooMany)
-{
-    SignInMemory memory;
-    const SignInMemory::Time start{};
-    memory.remember({"ann", "secret"}, start);
-    EXPECT_TRUE(memory.knows({"ann", "secret"}, start));
-    EXPECT_FALSE(memory.knows({"ann", "secre"}, start));
-    EXPECT_FALSE(memory.knows({"ann", "secrett"}, start));
-    EXPECT_FALSE(memory.knows({"anns", "ecret"}, start));
-    EXPECT_TRUE(memory.knows({"ann", "secret"}, start + SignInMemory::lifetime - 1s));
-    EXPECT_FALSE(memory.knows({"ann", "secret"}, start + SignInMemory::lifetime));
-    for (std::size_t i = 0; i < SignInMemory::capacity; ++i)
-        memory.remember({"user" + std::to_string(i), "p"}, start + 1s);
-    EXPECT_FALSE(memory.knows({"ann", "secret"}, start + 1s));
-    EXPECT_TRUE(memory.knows({"user0", "p"}, start + 1s));
-    memory.forgetAll();
-    EXPECT_FALSE(memory.knows({"user0", "p"}, start + 1s));
-}
-
-TEST(SignInDelaysTest, GrowWithEachFailureOfAnAddress)
-{
-    SignInDelays delays(1s);
-    const SignInDelays::Time start{};
-    EXPECT_EQ(delays.admission("a", start), start);
-    EXPECT_EQ(delays.failed("a", start), start + 1s);
-    EXPECT_EQ(delays.admission("a", start), start + 1s);
-    EXPECT_EQ(delays.admission("b", start), start);
-    EXPECT_EQ(delays.failed("a", start + 1s), start + 3s);
-    EXPECT_EQ(delays.failed("a", start + 3s), start + 7s);
-    for (int i = 0; i < 10; ++i)
-        delays.failed("a", start + 10s);
-    EXPECT_EQ(delays.admission("a", start + 10s), start + 42s);
-    const auto later = start + 10s + SignInDelays::memory + 1s;
-    EXPECT_EQ(delays.failed("a", later), later + 1s);
-}
-
-TEST(SignInDelaysTest, AfterAFailureOneIsTriedAtATime)
-{
-    SignInDelays delays(1s);
-    const SignInDelays::Time start{};
-    EXPECT_EQ(delays.admit("a", start), start);
-    EXPECT_EQ(delays.admit("a", start), start);
-    EXPECT_EQ(delays.failed("a", start), start + 1s);
-    EXPECT_EQ(delays.admit("a", start), start + 1s);
-    EXPECT_EQ(delays.admit("a", start + 1s), start + 1s);
-    EXPECT_EQ(delays.admit("a", start + 1s), start + 3s);
-    EXPECT_EQ(delays.failed("a", start + 1s), start + 3s);
-    EXPECT_EQ(delays.admit("b", start), start);
-    const auto later = start + SignInDelays::memory + 2s;
-    EXPECT_EQ(delays.admit("a", later), later);
-    EXPECT_EQ(delays.admit("a", later), later);
-}
-
-TEST(SignInDelaysTest, AreKeptForSoManyAddressesOnly)
-{
-    SignInDelays delays(1s);
-    const SignInDelays::Time start{};
-    for (std::size_t i = 0; i < SignInDelays::capacity + 10; ++i)
-        delays.failed(std::to_string(i), start + std::chrono::milliseconds(i));
-    EXPECT_EQ(delays.size(), SignInDelays::capacity);
-    EXPECT_EQ(delays.admission("0", start), start);
-    EXPECT_GT(delays.admission("20", start), start);
-}
-
-TEST(SignInsTest, RefusalsAreTimedFromTheBeginning)
-{
-    Host::Http::SignIns signIns(
-        std::make_shared<const Passwords>("ann:" + sha512 + "\nbob:" + dearBcrypt, "file"), 1s);
-    const Host::Http::SignIns::Time start{};
-    for (const std::string user : {"ann", "bob", "carl"})
-        EXPECT_EQ(signIns.tryPassword({user, "wrong"}, "address", user, start), start + 1s) << user;
-    EXPECT_EQ(signIns.tryPassword({"ann", "secret"}, "address", "ann", start), std::nullopt);
+    std::vector<std::string> texts;
+    for (const Testing::LogLine& line : log.log())
+        texts.push_back(line.text);
+    return texts;
 }
 
 class SignInTest : public HttpTest {
@@ -120,6 +32,17 @@ protected:
     static std::string as(const std::string& credentials)
     {
         return "Authorization: Basic " + credentials + "\r\n";
+    }
+
+    // Two clients with a wrong password each.
+    void guessTwiceAtATime()
+    {
+        HttpClient one = connect();
+        HttpClient other = connect();
+        one.send(post(wrong));
+        other.send(post(wrong));
+        EXPECT_EQ(one.receive().status, 401);
+        EXPECT_EQ(other.receive().status, 401);
     }
 
     const std::string right = as("YW5uOnNlY3JldA==");
@@ -204,8 +127,46 @@ TEST_F(SignInTest, FailuresAreToldLaterAndLater)
         EXPECT_EQ(client.receive().status, 401);
         EXPECT_GE(std::chrono::steady_clock::now() - begin, least);
     }
-    ASSERT_EQ(log.log().size(), 3U);
-    EXPECT_EQ(log.log()[0].text, "wrong password for \"ann\" from 127.0.0.1");
+    EXPECT_EQ(
+        textsIn(log), std::vector<std::string>(3, "wrong password for \"ann\" from 127.0.0.1"));
+}
+
+TEST_F(SignInTest, WhoSignsInIsToldToTheLogOnce)
+{
+    start();
+    const Testing::LogCapture log(6000);
+    EXPECT_EQ(ask(post(right)).status, 200);
+    EXPECT_EQ(ask(post(right)).status, 200);
+    EXPECT_EQ(textsIn(log), std::vector<std::string>{"\"ann\" signed in from 127.0.0.1"});
+    server->replacePasswords(passwords);
+    EXPECT_EQ(ask(post(right)).status, 200);
+    EXPECT_EQ(log.log().size(), 2U);
+}
+
+TEST_F(SignInTest, WhoAskedForWhatIsToldToThoseWhoWantToKnow)
+{
+    start();
+    EXPECT_EQ(ask(post(right)).status, 200);
+    const Testing::LogCapture log(4000);
+    EXPECT_EQ(ask(post(right)).status, 200);
+    EXPECT_EQ(ask(post(right, "")).status, 400);
+    EXPECT_EQ(ask(post()).status, 401);
+    EXPECT_THAT(textsIn(log),
+        testing::ElementsAre(R"(200 to 127.0.0.1, "ann", EnumerateClasses in root/cimv2)",
+            testing::StartsWith(R"(400 to 127.0.0.1, "ann", EnumerateClasses in root/cimv2: )"),
+            "401 to 127.0.0.1, EnumerateClasses in root/cimv2: "
+            "sign in with a name and a password"));
+}
+
+TEST_F(SignInTest, NamesCannotDisguiseALineOfTheLog)
+{
+    start();
+    const Testing::LogCapture log(6000);
+    // U+202E, U+0085, a byte that is no UTF-8, and an umlaut behind it
+    EXPECT_EQ(ask(post(as("YeKArmLChWP/w6Q6eA=="))).status, 401);
+    EXPECT_EQ(textsIn(log), std::vector<std::string>{"wrong password for "
+                                                     "\"a<U+202E>b<U+0085>c<0xFF>\u00e4\" "
+                                                     "from 127.0.0.1"});
 }
 
 TEST_F(SignInTest, SeveralConnectionsGuessNoFaster)
@@ -214,12 +175,7 @@ TEST_F(SignInTest, SeveralConnectionsGuessNoFaster)
     limits.workers = 1;
     start();
     const auto begin = std::chrono::steady_clock::now();
-    HttpClient one = connect();
-    HttpClient other = connect();
-    one.send(post(wrong));
-    other.send(post(wrong));
-    EXPECT_EQ(one.receive().status, 401);
-    EXPECT_EQ(other.receive().status, 401);
+    guessTwiceAtATime();
     EXPECT_GE(std::chrono::steady_clock::now() - begin, 600ms); // 200 and then 400
 }
 
@@ -228,12 +184,7 @@ TEST_F(SignInTest, AfterAFailureConnectionsTakeTurns)
     start();
     EXPECT_EQ(ask(post(wrong)).status, 401);
     const auto begin = std::chrono::steady_clock::now();
-    HttpClient one = connect();
-    HttpClient other = connect();
-    one.send(post(wrong));
-    other.send(post(wrong));
-    EXPECT_EQ(one.receive().status, 401);
-    EXPECT_EQ(other.receive().status, 401);
+    guessTwiceAtATime();
     EXPECT_GE(std::chrono::steady_clock::now() - begin, 600ms); // 200 and then 400
 }
 

@@ -1,0 +1,116 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// What is known of those who sign in, without sockets.
+
+#include "host/http/SignIns.h"
+#include "host/http/BasicCredentials.h"
+#include "tests/host/http/Hashes.h"
+
+#include <gtest/gtest.h>
+
+namespace HttpTests {
+
+namespace {
+
+using Host::Http::Passwords;
+using Host::Http::SignInDelays;
+using Host::Http::SignInMemory;
+using namespace std::chrono_literals;
+
+TEST(BasicCredentialsTest, AreReadFromTheirEncoding)
+{
+    const auto user = [](const std::string& field) {
+        const auto found = Host::Http::basicCredentials(field);
+        return found ? found->user + "|" + found->password : "none";
+    };
+    EXPECT_EQ(user("Basic YW5uOnNlY3JldA=="), "ann|secret");
+    EXPECT_EQ(user("bAsIc   YW5uOnNlY3JldA=="), "ann|secret");
+    EXPECT_EQ(user("Basic YW5uOg=="), "ann|");
+    EXPECT_EQ(user("Basic YW5uOmE6Yg=="), "ann|a:b");
+    EXPECT_EQ(user("Basic w6TDtjrDvA=="), "äö|ü");
+    for (const std::string field : {"", "Basic", "Basic ",
+             "YW5uOnNlY3JldA==", "Digest YW5uOnNlY3JldA==", "Basic YW5uOnNlY3JldA",
+             "Basic YW5uOnNlY3JldA=", "Basic YW5u",
+             "Basic OnNlY3JldA==", "Basic YW5uAHg6eA==", "Basic ====", "Basic YW5uOnNl*3JldA=="})
+        EXPECT_EQ(user(field), "none") << field;
+}
+
+TEST(SignInMemoryTest, ForgetsInTimeAndWhenThereAreTooMany)
+{
+    SignInMemory memory;
+    const SignInMemory::Time start{};
+    EXPECT_TRUE(memory.remember({"ann", "secret"}, "a", start));
+    EXPECT_FALSE(memory.remember({"ann", "secret"}, "a", start));
+    EXPECT_FALSE(memory.knows({"ann", "secret"}, "b", start));
+    EXPECT_TRUE(memory.knows({"ann", "secret"}, "a", start));
+    EXPECT_FALSE(memory.knows({"ann", "secre"}, "a", start));
+    EXPECT_FALSE(memory.knows({"ann", "secrett"}, "a", start));
+    EXPECT_FALSE(memory.knows({"anns", "ecret"}, "a", start));
+    EXPECT_TRUE(memory.knows({"ann", "secret"}, "a", start + SignInMemory::lifetime - 1s));
+    EXPECT_FALSE(memory.knows({"ann", "secret"}, "a", start + SignInMemory::lifetime));
+    for (std::size_t i = 0; i < SignInMemory::capacity; ++i)
+        memory.remember({"user" + std::to_string(i), "p"}, "a", start + 1s);
+    EXPECT_FALSE(memory.knows({"ann", "secret"}, "a", start + 1s));
+    EXPECT_TRUE(memory.knows({"user0", "p"}, "a", start + 1s));
+    memory.forgetAll();
+    EXPECT_FALSE(memory.knows({"user0", "p"}, "a", start + 1s));
+}
+
+TEST(SignInDelaysTest, GrowWithEachFailureOfAnAddress)
+{
+    SignInDelays delays(1s);
+    const SignInDelays::Time start{};
+    EXPECT_EQ(delays.admission("a", start), start);
+    EXPECT_EQ(delays.failed("a", start), start + 1s);
+    EXPECT_EQ(delays.admission("a", start), start + 1s);
+    EXPECT_EQ(delays.admission("b", start), start);
+    EXPECT_EQ(delays.failed("a", start + 1s), start + 3s);
+    EXPECT_EQ(delays.failed("a", start + 3s), start + 7s);
+    for (int i = 0; i < 10; ++i)
+        delays.failed("a", start + 10s);
+    EXPECT_EQ(delays.admission("a", start + 10s), start + 42s);
+    const auto later = start + 10s + SignInDelays::memory + 1s;
+    EXPECT_EQ(delays.failed("a", later), later + 1s);
+}
+
+TEST(SignInDelaysTest, AfterAFailureOneIsTriedAtATime)
+{
+    SignInDelays delays(1s);
+    const SignInDelays::Time start{};
+    EXPECT_EQ(delays.admit("a", start), start);
+    EXPECT_EQ(delays.admit("a", start), start);
+    EXPECT_EQ(delays.failed("a", start), start + 1s);
+    EXPECT_EQ(delays.admit("a", start), start + 1s);
+    EXPECT_EQ(delays.admit("a", start + 1s), start + 1s);
+    EXPECT_EQ(delays.admit("a", start + 1s), start + 3s);
+    EXPECT_EQ(delays.failed("a", start + 1s), start + 3s);
+    EXPECT_EQ(delays.admit("b", start), start);
+    const auto later = start + SignInDelays::memory + 2s;
+    EXPECT_EQ(delays.admit("a", later), later);
+    EXPECT_EQ(delays.admit("a", later), later);
+}
+
+TEST(SignInDelaysTest, AreKeptForSoManyAddressesOnly)
+{
+    SignInDelays delays(1s);
+    const SignInDelays::Time start{};
+    for (std::size_t i = 0; i < SignInDelays::capacity + 10; ++i)
+        delays.failed(std::to_string(i), start + std::chrono::milliseconds(i));
+    EXPECT_EQ(delays.size(), SignInDelays::capacity);
+    EXPECT_EQ(delays.admission("0", start), start);
+    EXPECT_GT(delays.admission("20", start), start);
+}
+
+TEST(SignInsTest, RefusalsAreTimedFromTheBeginning)
+{
+    Host::Http::SignIns signIns(
+        std::make_shared<const Passwords>("ann:" + sha512 + "\nbob:" + dearBcrypt, "file"), 1s);
+    const Host::Http::SignIns::Time start{};
+    for (const std::string user : {"ann", "bob", "carl"})
+        EXPECT_EQ(signIns.tryPassword({user, "wrong"}, "address", user, start), start + 1s) << user;
+    EXPECT_EQ(signIns.tryPassword({"ann", "secret"}, "address", "ann", start), std::nullopt);
+}
+
+} // namespace
+
+} // namespace HttpTests
