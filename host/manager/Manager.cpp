@@ -55,6 +55,16 @@ Manager::~Manager()
     broker_.setUpcalls(nullptr); // a cleanup that calls up finds nobody
 }
 
+void Manager::preload()
+{
+    for (const ProviderRegistration& registration : routing_.registrations()) {
+        if (registration.servesInstances)
+            instanceMI(registration);
+        if (registration.servesAssociations)
+            associationMI(registration);
+    }
+}
+
 CMPIInstanceMI& Manager::instanceMI(const ProviderRegistration& registration)
 {
     return loaded([&]() -> CMPIInstanceMI& { return source_->instanceMI(registration); });

@@ -55,6 +55,10 @@ public:
 
     const Broker& broker() const noexcept { return broker_; }
 
+    // Loads all that is registered, which is otherwise loaded when it is first needed. Throws
+    // Refusal (CMPI_RC_ERR_FAILED) for the first that cannot be used, naming it and the reason.
+    void preload();
+
     // Of the path's class and of all classes below it.
     void enumerateInstanceNames(const Context& context, const ObjectPath& path, ResultSink& sink);
     void enumerateInstances(

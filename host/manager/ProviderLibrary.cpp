@@ -4,6 +4,7 @@
 
 #include "host/broker/Broker.h"
 #include "host/broker/Request.h"
+#include "host/manager/MakingTurn.h"
 
 #include <dlfcn.h>
 
@@ -69,14 +70,26 @@ CMPIAssociationMI& ProviderLibrary::associationMI(const std::string& provider)
 }
 
 template <typename MI>
-MI& ProviderLibrary::mi(std::map<std::string, MI*>& known, const std::string& factory)
+MI* ProviderLibrary::findMade(
+    const std::map<std::string, MI*>& made, const std::string& factory) const
 {
-    const auto place = known.find(factory);
-    if (place != known.end())
-        return *place->second;
-    MI* const made = create<MI>(factory);
-    known.emplace(factory, made);
-    return *made;
+    const std::lock_guard lock(mutex_);
+    const auto place = made.find(factory);
+    return place == made.end() ? nullptr : place->second;
+}
+
+template <typename MI>
+MI& ProviderLibrary::mi(std::map<std::string, MI*>& made, const std::string& factory)
+{
+    if (MI* const known = findMade(made, factory))
+        return *known;
+    const MakingTurn turn(file_ + ": " + factory);
+    if (MI* const known = findMade(made, factory))
+        return *known;
+    MI* const first = create<MI>(factory);
+    const std::lock_guard lock(mutex_);
+    made.emplace(factory, first);
+    return *first;
 }
 
 template <typename MI>

@@ -9,13 +9,14 @@
 
 #include <map>
 #include <memory>
+#include <mutex>
 #include <string>
 
 namespace Host {
 
 class Broker;
 
-// Used by one thread at a time; the MIs it hands out may be called from any thread.
+// Used from any thread, and so are the MIs that it hands out.
 class ProviderLibrary {
 public:
     // Loads the file with its symbols kept to itself. The broker must outlive the library.
@@ -28,8 +29,10 @@ public:
     ProviderLibrary& operator=(const ProviderLibrary&) = delete;
 
     // The MI of the provider with that name, made at the first call; it belongs to the library
-    // and lasts as long as this object. Throw std::runtime_error naming the file when the
-    // library exports no such factory or its factory refuses.
+    // and lasts as long as this object. A factory may call up, and no lock is held meanwhile; those
+    // that ask for the same MI wait for it. Throw std::runtime_error naming the file when the
+    // library exports no such factory, when its factory refuses and where that asks, by itself or
+    // through others, for what it is to make.
     CMPIInstanceMI& instanceMI(const std::string& provider);
     CMPIAssociationMI& associationMI(const std::string& provider);
 
@@ -39,7 +42,9 @@ private:
     };
 
     template <typename MI>
-    MI& mi(std::map<std::string, MI*>& known, const std::string& factory);
+    MI* findMade(const std::map<std::string, MI*>& made, const std::string& factory) const;
+    template <typename MI>
+    MI& mi(std::map<std::string, MI*>& made, const std::string& factory);
     template <typename MI>
     MI* create(const std::string& factory) const;
     bool cleanUp() noexcept;
@@ -47,6 +52,7 @@ private:
     const Broker& broker_;
     std::string file_;
     std::unique_ptr<void, Unload> library_;
+    mutable std::mutex mutex_; // of the maps
     std::map<std::string, CMPIInstanceMI*> instanceMIs_;
     std::map<std::string, CMPIAssociationMI*> associationMIs_;
 };

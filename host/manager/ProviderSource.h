@@ -8,7 +8,9 @@
 #include "host/manager/ProviderRegistration.h"
 
 #include <map>
+#include <memory>
 #include <mutex>
+#include <string>
 
 namespace Host {
 
@@ -35,13 +37,12 @@ public:
     CMPIAssociationMI& associationMI(const ProviderRegistration& registration) override;
 
 private:
+    ProviderLibrary* findLoaded(const std::string& file);
     ProviderLibrary& library(const std::string& file);
 
     const Broker& broker_;
-    // Held while a library is loaded and while a factory makes an MI, never during a request.
-    // A factory may call up, and so ask for another MI on the same thread.
-    std::recursive_mutex mutex_;
-    std::map<std::string, ProviderLibrary> libraries_;
+    std::mutex mutex_; // of the map, and never held while a library is loaded or called
+    std::map<std::string, std::unique_ptr<ProviderLibrary>> libraries_;
 };
 
 } // namespace Host

@@ -26,8 +26,15 @@ public:
     // The classes must outlive the routing.
     Routing(const ClassInformation& classes, std::vector<ProviderRegistration> registrations);
 
+    const std::vector<ProviderRegistration>& registrations() const noexcept
+    {
+        return registrations_;
+    }
+
     // Of the path's class itself: an object is of one class.
     const ProviderRegistration& providerOf(const ObjectPath& path) const;
+    // The same; null where no provider serves the class.
+    const ProviderRegistration* findProviderOf(const ObjectPath& path) const;
 
     // Of the path's class and of all below it, in the order of registration; never empty.
     Registrations providersBelow(const ObjectPath& path) const;

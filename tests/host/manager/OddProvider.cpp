@@ -8,6 +8,7 @@
 namespace {
 
 Testing::OddProviderReport report;
+Testing::OddProviderHook hook = nullptr;
 
 CMPIStatus countCleanup(const CMPIContext* context, CMPIrc answer)
 {
@@ -56,6 +57,29 @@ extern "C" {
 [[gnu::visibility("default")]] const Testing::OddProviderReport* oddProviderReport()
 {
     return &report;
+}
+
+[[gnu::visibility("default")]] void setOddProviderHook(Testing::OddProviderHook wanted)
+{
+    hook = wanted;
+}
+
+[[gnu::visibility("default")]] CMPIInstanceMI* Hooked_Create_InstanceMI(
+    const CMPIBroker* broker, const CMPIContext* context, CMPIStatus*)
+{
+    static CMPIInstanceMI mi{};
+    static const auto table = tableWith<CMPIInstanceMIFT>(200, leave);
+    hook(broker, context, false);
+    return made(mi, table);
+}
+
+[[gnu::visibility("default")]] CMPIAssociationMI* Hooked_Create_AssociationMI(
+    const CMPIBroker* broker, const CMPIContext* context, CMPIStatus*)
+{
+    static CMPIAssociationMI mi{};
+    static const auto table = tableWith<CMPIAssociationMIFT>(200, leaveAssociation);
+    hook(broker, context, true);
+    return made(mi, table);
 }
 
 [[gnu::visibility("default")]] CMPIInstanceMI* Leaving_Create_InstanceMI(

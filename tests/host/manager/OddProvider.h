@@ -4,6 +4,8 @@
 
 #pragma once
 
+#include <cmpidt.h>
+
 namespace Testing {
 
 struct OddProviderReport {
@@ -12,6 +14,10 @@ struct OddProviderReport {
     int cleanedUpWithContext = 0;
 };
 
+// What the factories of the provider Hooked call before they make anything.
+using OddProviderHook = void (*)(const CMPIBroker*, const CMPIContext*, bool isOfAssociations);
+
+using OddProviderSetHookFunction = void (*)(OddProviderHook);
 using OddProviderReportFunction = const OddProviderReport* (*)();
 
 } // namespace Testing
