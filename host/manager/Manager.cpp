@@ -27,6 +27,11 @@ auto& loaded(const Load& load)
     }
 }
 
+[[noreturn]] void refuseMissing(const ObjectPath& path)
+{
+    throw Refusal(CMPI_RC_ERR_NOT_FOUND, "there is no " + path.toText());
+}
+
 // The objects that references finds are of the association class itself.
 Manager::Association ofReferences(const Manager::Association& association)
 {
@@ -81,8 +86,8 @@ void Manager::enumerateInstanceNames(
     gatherAnswers(routing_.providersBelow(path), sink,
         [&](const ProviderRegistration& provider, ResultSink& answer) {
             CMPIInstanceMI& mi = instanceMI(provider);
-            callProvider(provider, mi, mi.ft->enumerateInstanceNames, context, answer,
-                targetOf(path, provider.className));
+            callProvider(provider, "enumerating instance names", mi, mi.ft->enumerateInstanceNames,
+                context, answer, targetOf(path, provider.className));
         });
 }
 
@@ -92,21 +97,25 @@ void Manager::enumerateInstances(
     gatherAnswers(routing_.providersBelow(path), sink,
         [&](const ProviderRegistration& provider, ResultSink& answer) {
             CMPIInstanceMI& mi = instanceMI(provider);
-            callProvider(provider, mi, mi.ft->enumerateInstances, context, answer,
-                targetOf(path, provider.className), properties);
+            callProvider(provider, "enumerating instances", mi, mi.ft->enumerateInstances, context,
+                answer, targetOf(path, provider.className), properties);
         });
 }
 
 const Instance& Manager::getInstance(
     const Context& context, const ObjectPath& path, const char** properties)
 {
-    const ProviderRegistration& provider = routing_.providerOf(path);
+    // Where nobody serves the class there are no objects of it.
+    const ProviderRegistration* const served = routing_.findProviderOf(path);
+    if (served == nullptr)
+        refuseMissing(path);
+    const ProviderRegistration& provider = *served;
     CMPIInstanceMI& mi = instanceMI(provider);
     CollectedResult answer;
-    callProvider(provider, mi, mi.ft->getInstance, context, answer,
+    callProvider(provider, "getting instances", mi, mi.ft->getInstance, context, answer,
         targetOf(path, provider.className), properties);
     if (answer.instances().empty())
-        throw Refusal(CMPI_RC_ERR_NOT_FOUND, "there is no " + path.toText());
+        refuseMissing(path);
     return *answer.instances().front();
 }
 
@@ -116,7 +125,7 @@ const ObjectPath& Manager::createInstance(
     const ProviderRegistration& provider = routing_.providerOf(path);
     CMPIInstanceMI& mi = instanceMI(provider);
     CollectedResult answer;
-    callProvider(provider, mi, mi.ft->createInstance, context, answer,
+    callProvider(provider, "creating instances", mi, mi.ft->createInstance, context, answer,
         targetOf(path, provider.className), instance.handle());
     if (answer.paths().empty())
         throw Refusal(CMPI_RC_ERR_FAILED, provider.providerName + " does not say what it made");
@@ -129,7 +138,7 @@ void Manager::modifyInstance(const Context& context, const ObjectPath& path,
     const ProviderRegistration& provider = routing_.providerOf(path);
     CMPIInstanceMI& mi = instanceMI(provider);
     CollectedResult answer;
-    callProvider(provider, mi, mi.ft->modifyInstance, context, answer,
+    callProvider(provider, "modifying instances", mi, mi.ft->modifyInstance, context, answer,
         targetOf(path, provider.className), instance.handle(), properties);
 }
 
@@ -138,8 +147,8 @@ void Manager::deleteInstance(const Context& context, const ObjectPath& path)
     const ProviderRegistration& provider = routing_.providerOf(path);
     CMPIInstanceMI& mi = instanceMI(provider);
     CollectedResult answer;
-    callProvider(
-        provider, mi, mi.ft->deleteInstance, context, answer, targetOf(path, provider.className));
+    callProvider(provider, "deleting instances", mi, mi.ft->deleteInstance, context, answer,
+        targetOf(path, provider.className));
 }
 
 void Manager::execQuery(const Context& context, const ObjectPath& path, const char* query,
@@ -148,7 +157,7 @@ void Manager::execQuery(const Context& context, const ObjectPath& path, const ch
     gatherAnswers({&routing_.providerOf(path)}, sink,
         [&](const ProviderRegistration& provider, ResultSink& answer) {
             CMPIInstanceMI& mi = instanceMI(provider);
-            callProvider(provider, mi, mi.ft->execQuery, context, answer,
+            callProvider(provider, "queries", mi, mi.ft->execQuery, context, answer,
                 targetOf(path, provider.className), query, language);
         });
 }
@@ -160,8 +169,8 @@ void Manager::associators(const Context& context, const ObjectPath& source,
         [&](const ProviderRegistration& provider, ResultSink& answer) {
             CMPIAssociationMI& mi = associationMI(provider);
             AnswerOfClass wanted(answer, routing_, source.nameSpace(), association.resultClass);
-            callProvider(provider, mi, mi.ft->associators, context, wanted,
-                targetOf(source, routing_.classNameOf(source)), provider.className.c_str(),
+            callProvider(provider, "following associations", mi, mi.ft->associators, context,
+                wanted, targetOf(source, routing_.classNameOf(source)), provider.className.c_str(),
                 routing_.resultClassFor(provider, source, association), association.role,
                 association.resultRole, properties);
         });
@@ -174,8 +183,8 @@ void Manager::associatorNames(const Context& context, const ObjectPath& source,
         [&](const ProviderRegistration& provider, ResultSink& answer) {
             CMPIAssociationMI& mi = associationMI(provider);
             AnswerOfClass wanted(answer, routing_, source.nameSpace(), association.resultClass);
-            callProvider(provider, mi, mi.ft->associatorNames, context, wanted,
-                targetOf(source, routing_.classNameOf(source)), provider.className.c_str(),
+            callProvider(provider, "following associations", mi, mi.ft->associatorNames, context,
+                wanted, targetOf(source, routing_.classNameOf(source)), provider.className.c_str(),
                 routing_.resultClassFor(provider, source, association), association.role,
                 association.resultRole);
         });
@@ -188,7 +197,7 @@ void Manager::references(const Context& context, const ObjectPath& source,
         [&](const ProviderRegistration& provider, ResultSink& answer) {
             CMPIAssociationMI& mi = associationMI(provider);
             AnswerOfClass wanted(answer, routing_, source.nameSpace(), association.resultClass);
-            callProvider(provider, mi, mi.ft->references, context, wanted,
+            callProvider(provider, "finding references", mi, mi.ft->references, context, wanted,
                 targetOf(source, routing_.classNameOf(source)), provider.className.c_str(),
                 association.role, properties);
         });
@@ -201,7 +210,7 @@ void Manager::referenceNames(const Context& context, const ObjectPath& source,
         [&](const ProviderRegistration& provider, ResultSink& answer) {
             CMPIAssociationMI& mi = associationMI(provider);
             AnswerOfClass wanted(answer, routing_, source.nameSpace(), association.resultClass);
-            callProvider(provider, mi, mi.ft->referenceNames, context, wanted,
+            callProvider(provider, "finding references", mi, mi.ft->referenceNames, context, wanted,
                 targetOf(source, routing_.classNameOf(source)), provider.className.c_str(),
                 association.role);
         });

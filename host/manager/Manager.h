@@ -25,8 +25,9 @@ class ResultSink;
 // went well. It throws Refusal when it fails:
 //
 //   CMPI_RC_ERR_INVALID_CLASS   the path, or a class name beside it, names an unknown class
-//   CMPI_RC_ERR_NOT_SUPPORTED   no provider serves the class, or it does not offer this
-//   CMPI_RC_ERR_NOT_FOUND       there is no such object
+//   CMPI_RC_ERR_NOT_SUPPORTED   no provider serves the class, or it does not support this
+//   CMPI_RC_ERR_NOT_FOUND       there is no such object, as there is none to get of a class that no
+//                               provider serves
 //   CMPI_RC_ERR_FAILED          a provider cannot be loaded, or providers call up in a circle
 //
 // and with a provider's own code and message when that fails. What the sink has got before a

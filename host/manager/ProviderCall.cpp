@@ -33,13 +33,18 @@ const CMPIObjectPath* targetOf(const ObjectPath& path, const std::string& classN
     return target.handle();
 }
 
-void checkStatus(const ProviderRegistration& registration, const CMPIStatus& status)
+void checkStatus(
+    const ProviderRegistration& registration, const char* operation, const CMPIStatus& status)
 {
     if (status.rc == CMPI_RC_OK)
         return;
-    const std::string message = messageOf(status);
-    throw Refusal(status.rc,
-        message.empty() ? registration.providerName + " answers " + describe(status) : message);
+    std::string message = messageOf(status);
+    if (message.empty() && status.rc == CMPI_RC_ERR_NOT_SUPPORTED)
+        message = registration.providerName + " does not support " + operation + " of " +
+                  registration.className;
+    else if (message.empty())
+        message = registration.providerName + " answers " + describe(status);
+    throw Refusal(status.rc, message);
 }
 
 } // namespace Host

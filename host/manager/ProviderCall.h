@@ -33,18 +33,20 @@ public:
 // however the client spelt it.
 const CMPIObjectPath* targetOf(const ObjectPath& path, const std::string& className);
 
-// Throws Refusal with the status's code and message unless it is OK.
-void checkStatus(const ProviderRegistration& registration, const CMPIStatus& status);
+// Throws Refusal with the status's code and message unless it is OK. The operation is for those
+// that are not supported: what the provider would do, such as "creating instances".
+void checkStatus(
+    const ProviderRegistration& registration, const char* operation, const CMPIStatus& status);
 
 // Throws Refusal when the provider leaves the function out, when it throws, and with what it
 // answers unless that is OK.
 template <typename MI, typename Function, typename... Arguments>
-void callProvider(const ProviderRegistration& registration, MI& mi, Function function,
-    const Context& context, ResultSink& sink, const CMPIObjectPath* target, Arguments... arguments)
+void callProvider(const ProviderRegistration& registration, const char* operation, MI& mi,
+    Function function, const Context& context, ResultSink& sink, const CMPIObjectPath* target,
+    Arguments... arguments)
 {
     if (function == nullptr)
-        throw Refusal(CMPI_RC_ERR_NOT_SUPPORTED,
-            registration.providerName + " does not offer this operation");
+        checkStatus(registration, operation, {CMPI_RC_ERR_NOT_SUPPORTED, nullptr});
     const CallDepth depth(registration);
     Result result(sink);
     CMPIStatus status = {CMPI_RC_OK, nullptr};
@@ -53,7 +55,7 @@ void callProvider(const ProviderRegistration& registration, MI& mi, Function fun
     } catch (const std::exception& error) {
         throw Refusal(CMPI_RC_ERR_FAILED, registration.providerName + ": " + error.what());
     }
-    checkStatus(registration, status);
+    checkStatus(registration, operation, status);
 }
 
 } // namespace Host

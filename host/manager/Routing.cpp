@@ -34,14 +34,20 @@ Routing::Routing(const ClassInformation& classes, std::vector<ProviderRegistrati
 {
 }
 
-const ProviderRegistration& Routing::providerOf(const ObjectPath& path) const
+const ProviderRegistration* Routing::findProviderOf(const ObjectPath& path) const
 {
     checkKnown(path.nameSpace(), path.className());
     const auto found = std::find_if(
         registrations_.begin(), registrations_.end(), [&](const ProviderRegistration& candidate) {
             return candidate.servesInstances && equalNames(candidate.className, path.className());
         });
-    if (found == registrations_.end())
+    return found == registrations_.end() ? nullptr : &*found;
+}
+
+const ProviderRegistration& Routing::providerOf(const ObjectPath& path) const
+{
+    const ProviderRegistration* const found = findProviderOf(path);
+    if (found == nullptr)
         refuseUnserved(path.className());
     return *found;
 }

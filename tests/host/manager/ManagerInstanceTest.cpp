@@ -11,7 +11,6 @@ using ::testing::HasSubstr;
 using ::testing::IsEmpty;
 using Testing::ProviderCall;
 using Testing::refusalOf;
-using ::testing::StartsWith;
 
 constexpr CMPIStatus Ok = {CMPI_RC_OK, nullptr};
 
@@ -69,15 +68,25 @@ TEST_F(ManagerInstanceTest, aClassWithoutProviderIsNotSupported)
     const std::string expected = "code 7: no provider serves the class Idle";
     EXPECT_EQ(refusalOf([&] { manager_.enumerateInstanceNames(context(), path("Idle"), answer_); }),
         expected);
-    EXPECT_EQ(refusalOf([&] { manager_.getInstance(context(), path("Idle"), nullptr); }), expected);
+    Host::Instance& idle = request_->makeInstance(path("Idle"));
+    EXPECT_EQ(refusalOf([&] { manager_.createInstance(context(), path("Idle"), idle); }), expected);
+    EXPECT_EQ(refusalOf([&] { manager_.modifyInstance(context(), path("Idle"), idle, nullptr); }),
+        expected);
+    EXPECT_EQ(refusalOf([&] { manager_.deleteInstance(context(), path("Idle")); }), expected);
+}
+
+TEST_F(ManagerInstanceTest, ofAClassWithoutProviderNothingIsFound)
+{
+    EXPECT_EQ(refusalOf([&] { manager_.getInstance(context(), path("Idle"), nullptr); }),
+        "code 6: there is no root/cimv2:Idle");
 }
 
 TEST_F(ManagerInstanceTest, anInstanceIsOfItsOwnClassOnly)
 {
     EXPECT_EQ(manager_.getInstance(context(), path("Part"), nullptr).className(), "Part");
     EXPECT_THAT(calls_, ElementsAre("Parts getInstance Part"));
-    EXPECT_THAT(refusalOf([&] { manager_.getInstance(context(), path("Thing"), nullptr); }),
-        StartsWith("code 7"));
+    EXPECT_EQ(refusalOf([&] { manager_.getInstance(context(), path("Thing"), nullptr); }),
+        "code 6: there is no root/cimv2:Thing");
 }
 
 TEST_F(ManagerInstanceTest, anAnswerWithoutInstanceIsNotFound)
@@ -129,6 +138,30 @@ TEST_F(ManagerInstanceTest, anErrorWithoutMessageNamesTheProvider)
     script("Boxes", [](const ProviderCall&) { return CMPIStatus{CMPI_RC_ERR_FAILED, nullptr}; });
     EXPECT_EQ(refusalOf([&] { manager_.getInstance(context(), path("Box"), nullptr); }),
         "code 1: Boxes answers code 1");
+}
+
+TEST_F(ManagerInstanceTest, whatAProviderDoesNotSupportIsSaid)
+{
+    script("Boxes", [](const ProviderCall&) {
+        return CMPIStatus{CMPI_RC_ERR_NOT_SUPPORTED, nullptr};
+    });
+    Host::Instance& box = request_->makeInstance(path("Box"));
+    const auto what = [](const char* operation) {
+        return std::string("code 7: Boxes does not support ") + operation + " of Box";
+    };
+    EXPECT_EQ(refusalOf([&] { manager_.getInstance(context(), path("Box"), nullptr); }),
+        what("getting instances"));
+    EXPECT_EQ(refusalOf([&] { manager_.createInstance(context(), path("Box"), box); }),
+        what("creating instances"));
+    EXPECT_EQ(refusalOf([&] { manager_.modifyInstance(context(), path("Box"), box, nullptr); }),
+        what("modifying instances"));
+    EXPECT_EQ(refusalOf([&] { manager_.deleteInstance(context(), path("Box")); }),
+        what("deleting instances"));
+    EXPECT_EQ(
+        refusalOf([&] { manager_.enumerateInstances(context(), path("Box"), nullptr, answer_); }),
+        what("enumerating instances"));
+    EXPECT_EQ(refusalOf([&] { manager_.enumerateInstanceNames(context(), path("Box"), answer_); }),
+        what("enumerating instance names"));
 }
 
 TEST_F(ManagerInstanceTest, anExceptionOfAProviderIsAFailure)
@@ -187,7 +220,7 @@ TEST_F(ManagerInstanceTest, aFunctionThatAProviderLeavesOutIsNotSupported)
     EXPECT_EQ(refusalOf([&] {
         manager_.execQuery(context(), path("Box"), "SELECT * FROM Box", "WQL", answer_);
     }),
-        "code 7: Boxes does not offer this operation");
+        "code 7: Boxes does not support queries of Box");
     EXPECT_THAT(calls_, IsEmpty());
 }
 

@@ -90,7 +90,7 @@ TEST_F(DispatcherFaultTest, whatAProviderLeavesOutIsNotSupported)
 {
     EXPECT_EQ(errorOf("ExecQuery",
                   valueOf("QueryLanguage", "WQL") + valueOf("Query", "SELECT * from\n Thing x")),
-        "7: Things does not offer this operation");
+        "7: Things does not support queries of Thing");
 }
 
 TEST_F(DispatcherFaultTest, aQueryOfAnUnknownClassIsOfAnInvalidOne)
