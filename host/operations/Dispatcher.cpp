@@ -28,7 +28,7 @@ CMPIrc statusCode(CMPIrc code)
 
 } // namespace
 
-Dispatcher::Dispatcher(const Repository& classes, Manager& manager, std::string hostName,
+Dispatcher::Dispatcher(const Repository& classes, Manager& manager, HostName hostName,
     const OperationLimits& limits, OpenEnumerations::Clock clock)
     : classes_(classes), manager_(manager), hostName_(std::move(hostName)),
       instances_(classes, manager), associations_(classes, manager),
@@ -63,7 +63,7 @@ std::unique_ptr<CimXml::Answer> Dispatcher::carryOut(
     AnswerObjects found(reading.shareArena());
     const auto continuation = run(operation, request, caller.principal, found);
     return std::make_unique<ObjectAnswer>(message, operation.kind, classes_,
-        CimXml::Location{hostName_, operation.nameSpace}, std::move(operation.selection),
+        CimXml::Location{hostName_(), operation.nameSpace}, std::move(operation.selection),
         std::move(found), continuation);
 }
 

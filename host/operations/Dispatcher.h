@@ -6,6 +6,7 @@
 
 #include "host/cimxml/OperationHandler.h"
 #include "host/operations/AssociationOperations.h"
+#include "host/operations/HostName.h"
 #include "host/operations/InstanceOperations.h"
 #include "host/operations/PullOperations.h"
 
@@ -19,7 +20,7 @@ class Dispatcher : public CimXml::OperationHandler {
 public:
     // The host's name is for paths that do not have one of their own. Classes and manager must
     // outlive the dispatcher and its answers.
-    Dispatcher(const Repository& classes, Manager& manager, std::string hostName,
+    Dispatcher(const Repository& classes, Manager& manager, HostName hostName,
         const OperationLimits& limits = {},
         OpenEnumerations::Clock clock = std::chrono::steady_clock::now);
 
@@ -38,7 +39,7 @@ private:
 
     const Repository& classes_;
     Manager& manager_;
-    const std::string hostName_;
+    const HostName hostName_;
     const InstanceOperations instances_;
     const AssociationOperations associations_;
     PullOperations pulls_;

@@ -21,7 +21,7 @@ inline constexpr const char* NamespaceClass = "CIM_Namespace";
 inline constexpr const char* ObjectManagerClass = "CIM_ObjectManager";
 inline constexpr const char* RegisteredProfileClass = "CIM_RegisteredProfile";
 
-// They never change, and may be read from any thread.
+// As they are at one moment.
 class InteropObjects {
 public:
     // The classes must outlive the objects.

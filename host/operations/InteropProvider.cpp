@@ -7,6 +7,7 @@
 #include "host/broker/String.h"
 
 #include <algorithm>
+#include <utility>
 
 namespace Host {
 
@@ -15,14 +16,14 @@ namespace {
 constexpr CMPIStatus Success = {CMPI_RC_OK, nullptr};
 constexpr const char* ProviderName = "InteropProvider";
 
-const InteropObjects& objectsOf(const CMPIInstanceMI* mi)
+InteropObjects objectsOf(const CMPIInstanceMI* mi)
 {
-    return *static_cast<const InteropObjects*>(mi->hdl);
+    return static_cast<const InteropProvider*>(mi->hdl)->objects();
 }
 
-std::vector<const Instance*> asked(const CMPIInstanceMI* mi, const CMPIObjectPath* target)
+std::string_view classOf(const CMPIObjectPath* path)
 {
-    return objectsOf(mi).ofClass(ObjectPath::of(target)->className());
+    return ObjectPath::of(path)->className();
 }
 
 CMPIStatus deliver(const Instance& object, const CMPIResult* result, const char** properties)
@@ -50,21 +51,24 @@ const CMPIInstanceMIFT Functions = {
     .enumerateInstanceNames =
         [](CMPIInstanceMI* mi, const CMPIContext*, const CMPIResult* result,
             const CMPIObjectPath* target) {
-            for (const Instance* const object : asked(mi, target))
+            const InteropObjects objects = objectsOf(mi);
+            for (const Instance* const object : objects.ofClass(classOf(target)))
                 result->ft->returnObjectPath(result, object->objectPath().handle());
             return Success;
         },
     .enumerateInstances =
         [](CMPIInstanceMI* mi, const CMPIContext*, const CMPIResult* result,
             const CMPIObjectPath* target, const char** properties) {
-            for (const Instance* const object : asked(mi, target))
+            const InteropObjects objects = objectsOf(mi);
+            for (const Instance* const object : objects.ofClass(classOf(target)))
                 deliver(*object, result, properties);
             return Success;
         },
     .getInstance =
         [](CMPIInstanceMI* mi, const CMPIContext*, const CMPIResult* result,
             const CMPIObjectPath* target, const char** properties) {
-            for (const Instance* const object : asked(mi, target))
+            const InteropObjects objects = objectsOf(mi);
+            for (const Instance* const object : objects.ofClass(classOf(target)))
                 if (isAt(*object, *ObjectPath::of(target)))
                     deliver(*object, result, properties);
             return Success;
@@ -77,8 +81,8 @@ const CMPIInstanceMIFT Functions = {
 
 } // namespace
 
-InteropProvider::InteropProvider(const Repository& classes, const std::string& hostName)
-    : objects_(classes, hostName), mi_{&objects_, &Functions}
+InteropProvider::InteropProvider(const Repository& classes, HostName hostName)
+    : classes_(classes), hostName_(std::move(hostName)), mi_{this, &Functions}
 {
 }
 

@@ -6,6 +6,7 @@
 
 #include "host/manager/ProviderRegistration.h"
 #include "host/manager/ProviderSource.h"
+#include "host/operations/HostName.h"
 #include "host/operations/InteropObjects.h"
 
 #include <cmpift.h>
@@ -20,15 +21,21 @@ namespace Host {
 class InteropProvider {
 public:
     // The classes must outlive it.
-    InteropProvider(const Repository& classes, const std::string& hostName);
+    InteropProvider(const Repository& classes, HostName hostName);
+    InteropProvider(const InteropProvider&) = delete;
+    InteropProvider& operator=(const InteropProvider&) = delete;
 
     CMPIInstanceMI& instanceMI() noexcept { return mi_; }
+
+    // As they are now.
+    InteropObjects objects() const { return {classes_, hostName_()}; }
 
     // Of the classes it serves; they name no library.
     static std::vector<ProviderRegistration> registrations();
 
 private:
-    InteropObjects objects_;
+    const Repository& classes_;
+    const HostName hostName_;
     CMPIInstanceMI mi_;
 };
 

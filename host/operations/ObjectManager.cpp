@@ -20,7 +20,7 @@ std::vector<ProviderRegistration> withInterop(std::vector<ProviderRegistration> 
 } // namespace
 
 ObjectManager::ObjectManager(const Repository& classes,
-    std::vector<ProviderRegistration> registrations, const std::string& hostName,
+    std::vector<ProviderRegistration> registrations, const HostName& hostName,
     const OperationLimits& limits)
     : interop_(classes, hostName),
       manager_(classes, withInterop(std::move(registrations)),

@@ -16,10 +16,13 @@ namespace Host {
 class ObjectManager : public CimXml::OperationHandler {
 public:
     // Serves the registered classes, and root/interop by itself. Libraries are loaded when they
-    // are first needed: one that cannot be used is the answer to an operation. The classes must
-    // outlive it, and it must outlive its answers.
+    // are first needed, unless the manager was told to: one that cannot be used is the answer to
+    // an operation. The classes must outlive it, and it must outlive its answers.
     ObjectManager(const Repository& classes, std::vector<ProviderRegistration> registrations,
-        const std::string& hostName, const OperationLimits& limits = {});
+        const HostName& hostName, const OperationLimits& limits = {});
+
+    // What answers the operations, for the process itself.
+    Manager& manager() noexcept { return manager_; }
 
     std::unique_ptr<CimXml::Answer> answer(
         const CimXml::Message& message, const CimXml::Caller& caller) override

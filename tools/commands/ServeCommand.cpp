@@ -197,7 +197,7 @@ public:
 
         Host::ObjectManager manager(*classes,
             Host::sensorProfileProviders(files.sensors, files.computerSystem),
-            Vorn::getSystemName(), options_.operations);
+            Vorn::getSystemName, options_.operations);
         MemoryReturn operations(manager);
         if (Host::Http::isRoot() && options_.user != "root")
             loadProviders(operations);

@@ -123,7 +123,8 @@ TEST_F(DispatcherFaultTest, anElementThatLacksSomethingIsNoAnswer)
 TEST_F(DispatcherFaultTest, aLibraryThatIsMissingIsAFailureThatNamesIt)
 {
     const auto classes = Testing::compile(CimXmlTests::Classes);
-    Host::ObjectManager manager(*classes, {{"Thing", "Things", "/no/such/library.so"}}, "host");
+    Host::ObjectManager manager(
+        *classes, {{"Thing", "Things", "/no/such/library.so"}}, [] { return std::string("host"); });
     EXPECT_THAT(errorIn(answerTo(manager, call("EnumerateInstances", ofThing_))),
         StartsWith("1: /no/such/library.so: "));
 }

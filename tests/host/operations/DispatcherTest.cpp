@@ -229,6 +229,14 @@ TEST_F(DispatcherTest, aPathWithoutHostGetsTheManagersAndItsNamespace)
                                   "<NAMESPACE NAME=\"test\"></NAMESPACE>"));
 }
 
+TEST_F(DispatcherTest, thePathsHostIsNamedAsItIsNow)
+{
+    manager_.deliverThings(1);
+    manager_.renameHost("renamed.example");
+    EXPECT_THAT(ask("OpenEnumerateInstancePaths", ofThing_ + valueOf("MaxObjectCount", "5")),
+        HasSubstr("<HOST>renamed.example</HOST>"));
+}
+
 } // namespace
 
 } // namespace OperationTests

@@ -56,7 +56,8 @@ protected:
     }
 
     const std::unique_ptr<const Host::Repository> classes_ = Testing::shippedClasses();
-    Host::InteropProvider interop_{*classes_, "host.example"};
+    std::string hostName_ = "host.example";
+    Host::InteropProvider interop_{*classes_, [this] { return hostName_; }};
     Host::Manager manager_{
         *classes_, Host::InteropProvider::registrations(), [this](const Host::Broker& broker) {
             return std::make_unique<Host::ProvidersWithInterop>(broker, interop_);
@@ -98,6 +99,20 @@ TEST_F(InteropProviderTest, thereIsOneNamespaceObjectForEachNamespace)
     for (const Host::ObjectPath* const path : answer.paths())
         names.emplace_back(*path->key("Name")->text());
     EXPECT_THAT(names, ElementsAre("root/cimv2", "root/interop"));
+}
+
+TEST_F(InteropProviderTest, theSystemIsNamedAsItIsNow)
+{
+    const auto systemName = [&](const char* className) {
+        Host::CollectedResult answer;
+        manager_.enumerateInstances(request_.context(),
+            request_.makePath(Host::InteropNameSpace, className), nullptr, answer);
+        return std::string(*answer.instances().at(0)->property("SystemName")->text());
+    };
+    EXPECT_EQ(systemName(Host::ObjectManagerClass), "host.example");
+    hostName_ = "renamed.example";
+    EXPECT_EQ(systemName(Host::ObjectManagerClass), "renamed.example");
+    EXPECT_EQ(systemName(Host::NamespaceClass), "renamed.example");
 }
 
 TEST_F(InteropProviderTest, everyPropertyIsDeclaredWithItsType)

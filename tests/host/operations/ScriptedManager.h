@@ -29,7 +29,8 @@ inline constexpr CMPIStatus Ok = {CMPI_RC_OK, nullptr};
 class ScriptedManager {
 public:
     explicit ScriptedManager(const Host::OperationLimits& limits = {})
-        : dispatcher_(classes(), manager_, "host.example", limits, [this] { return now_; })
+        : dispatcher_(
+              classes(), manager_, [this] { return hostName_; }, limits, [this] { return now_; })
     {
         for (const char* const name : {"Things", "Gauges", "Links"})
             script(name, [](const ProviderCall&) { return Ok; });
@@ -73,6 +74,7 @@ public:
     }
 
     void wait(std::chrono::seconds time) { now_ += time; }
+    void renameHost(const std::string& name) { hostName_ = name; }
 
 private:
     static const Host::Repository& classes()
@@ -84,6 +86,7 @@ private:
     const CMPIBroker* broker() const { return manager_.broker().handle(); }
 
     std::chrono::steady_clock::time_point now_;
+    std::string hostName_ = "host.example";
     Testing::ScriptedProviders providers_;
     Host::Manager manager_{classes(),
         {{"Thing", "Things", {}}, {"Gauge", "Gauges", {}}, {"Link", "Links", {}, true, true}},

@@ -15,11 +15,12 @@ namespace OperationTests {
 class ShippedManager {
 public:
     explicit ShippedManager(const Host::OperationLimits& limits = {})
-        : manager_(classes(),
+        : manager_(
+              classes(),
               Host::sensorProfileProviders(SENSOR_PROFILE_BINARY_DIR
                   "/lib/libSensorProfileProvider.so",
                   SENSOR_PROFILE_BINARY_DIR "/lib/libComputerSystemProvider.so"),
-              "host.example", limits)
+              [] { return std::string("host.example"); }, limits)
     {
     }
 
