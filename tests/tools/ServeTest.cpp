@@ -149,19 +149,42 @@ TEST_F(ServeTest, FilesThatCannotBeUsedAreNamed)
     const std::string text = secret("text", "no PEM\n");
     EXPECT_EQ(problem(withModel({"--certificate", "/none.crt", "--key", text})),
         "sensorctl: /none.crt: No such file or directory\n");
-    EXPECT_THAT(problem(withModel({"--certificate", text, "--key", text})),
-        HasSubstr("text: no certificate in PEM form"));
+    EXPECT_EQ(problem(withModel({"--certificate", text, "--key", text})),
+        "sensorctl: " + text + ": no certificate in PEM form: Base64 unexpected header error.\n");
     EXPECT_EQ(problem(withModel({"--passwords", "/none"})),
         "sensorctl: /none: No such file or directory\n");
-    EXPECT_THAT(
-        problem(withModel({"--passwords", text})), EndsWith("text:1: it is no user:hash\n"));
+    EXPECT_EQ(problem(withModel({"--passwords", text})),
+        "sensorctl: " + text + ":1: it is no user:hash\n");
     const std::string open = folder_.write("open", userLine);
     ::chmod(open.c_str(), 0644);
-    EXPECT_THAT(
-        problem(withModel({"--passwords", open})), HasSubstr("open: others than its owner"));
-    EXPECT_THAT(problem({"--model", text}), HasSubstr("text"));
-    EXPECT_THAT(problem({"--model", smallModel(), "--provider", "/none.so", "--port", "0"}),
-        HasSubstr("/none.so"));
+    EXPECT_EQ(problem(withModel({"--passwords", open})),
+        "sensorctl: " + open +
+            ": others than its owner can change it, or anybody can read it "
+            "(chmod 600 or 640 mends that)\n");
+    EXPECT_EQ(
+        problem({"--model", text}), "sensorctl: model file " + text +
+                                        ": line 1, column 2: syntax error while parsing value - "
+                                        "invalid literal; last read: 'no'\n");
+    EXPECT_EQ(problem(withModel({"--port", "0", "--provider", "/none.so"})),
+        "sensorctl: /none.so, which the server needs as the user it runs as (--user names "
+        "another): No such file or directory\n");
+}
+
+TEST_F(ServeTest, ProviderThatIsNoneIsToldAtTheStart)
+{
+    const auto problem = [&](const std::string& file) {
+        const Ended ended = failing(withModel({"--port", "0", "--provider", file}));
+        EXPECT_EQ(ended.code, 1);
+        EXPECT_EQ(ended.out, "");
+        return ended.err;
+    };
+    const std::string text = folder_.write("c.pem", std::string(100, '-'));
+    EXPECT_EQ(problem(text), "sensorctl: " + text + ": invalid ELF header\n");
+    EXPECT_EQ(problem("/bin/ls"),
+        "sensorctl: /bin/ls: cannot dynamically load position-independent executable\n");
+    const std::string other = SENSOR_PROFILE_BINARY_DIR "/lib/libComputerSystemProvider.so";
+    EXPECT_EQ(problem(other),
+        "sensorctl: " + other + ": no factory SensorProfileProvider_Create_InstanceMI\n");
 }
 
 TEST_F(ServeTest, OptionsThatMakeNoSenseAreWrongUsage)

@@ -1,6 +1,8 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-#include "host/cimxml/Message.h"
+#include "host/broker/CollectedResult.h"
+#include "host/broker/Refusal.h"
+#include "host/broker/Request.h"
 #include "host/http/EventLog.h"
 #include "host/http/Privileges.h"
 #include "host/http/Server.h"
@@ -11,6 +13,7 @@
 #include "tools/SourceOptions.h"
 #include "tools/UsageError.h"
 #include "tools/cim/Classes.h"
+#include "tools/cim/ProviderClient.h"
 #include "tools/commands/Commands.h"
 #include "tools/output/Output.h"
 #include "tools/serve/Greeting.h"
@@ -106,18 +109,23 @@ std::vector<std::string> modelFiles()
     return files;
 }
 
-// Makes the operations load the providers, and those the catalogs of their texts, while root
-// can read them: the user that serves may not.
-void loadProviders(Host::CimXml::OperationHandler& operations)
+// Makes the providers load the catalogs of their texts while root can read them: the user that
+// serves may not. That the sensors cannot be read now is no reason not to serve them later.
+void loadCatalogs(Host::Manager& manager)
 {
-    const Host::CimXml::Message message(
-        R"(<CIM CIMVERSION="2.0" DTDVERSION="2.0"><MESSAGE ID="1" PROTOCOLVERSION="1.0"><SIMPLEREQ>)"
-        R"(<IMETHODCALL NAME="EnumerateInstances"><LOCALNAMESPACEPATH><NAMESPACE NAME="root"/>)"
-        R"(<NAMESPACE NAME="cimv2"/></LOCALNAMESPACEPATH><IPARAMVALUE NAME="ClassName">)"
-        R"(<CLASSNAME NAME="CIM_LogicalElement"/></IPARAMVALUE><IPARAMVALUE NAME="PropertyList">)"
-        R"(<VALUE.ARRAY><VALUE>Caption</VALUE></VALUE.ARRAY></IPARAMVALUE></IMETHODCALL></SIMPLEREQ>)"
-        R"(</MESSAGE></CIM>)");
-    (void)operations.answer(message, {});
+    {
+        Host::Request request(manager.broker());
+        Host::CollectedResult found;
+        const char* texts[] = {"Caption", "Description", nullptr};
+        try {
+            manager.enumerateInstances(
+                request.context(), request.makePath(nameSpace, sensorClass), texts, found);
+        } catch (const Host::Refusal& refusal) {
+            report({"loadCatalogs", "ServeCommand", __LINE__},
+                std::string("the catalogs of texts are not loaded: ") + refusal.what());
+        }
+    }
+    ::malloc_trim(0); // what the sensors of a large machine took
 }
 
 // A server whose log is lost from the beginning is nothing to rely on. One that loses it later
@@ -195,12 +203,13 @@ public:
         if (files.computerSystem)
             requireReadable(*files.computerSystem);
 
-        Host::ObjectManager manager(*classes,
+        Host::ObjectManager objects(*classes,
             Host::sensorProfileProviders(files.sensors, files.computerSystem),
             Vorn::getSystemName, options_.operations);
-        MemoryReturn operations(manager);
+        MemoryReturn operations(objects);
+        objects.manager().preload();
         if (Host::Http::isRoot() && options_.user != "root")
-            loadProviders(operations);
+            loadCatalogs(objects.manager());
         beginLog(renounceRoot(options_.user), out);
         for (const std::string& file : modelFiles())
             requireReadable(file);
