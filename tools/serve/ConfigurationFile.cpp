@@ -2,6 +2,7 @@
 
 #include "tools/serve/ConfigurationFile.h"
 
+#include "host/cimxml/Characters.h"
 #include "tools/UsageError.h"
 
 #include <CLI/CLI.hpp>
@@ -18,18 +19,11 @@ namespace Tools {
 
 namespace {
 
+using Host::CimXml::trimmed;
+
 // Of the command line alone.
 constexpr std::string_view nameOfFileOption = "config";
 constexpr std::string_view nameOfHelpOption = "help";
-
-std::string_view trimmed(std::string_view text)
-{
-    constexpr std::string_view blanks = " \t\r";
-    const std::size_t first = text.find_first_not_of(blanks);
-    if (first == std::string_view::npos)
-        return {};
-    return text.substr(first, text.find_last_not_of(blanks) - first + 1);
-}
 
 class Reader {
 public:
