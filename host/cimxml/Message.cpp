@@ -104,7 +104,7 @@ std::string nameSpaceOf(const Element& localNameSpacePath)
 }
 
 Message::Message(std::string_view body, std::size_t maximumDepth)
-    : document_(std::make_unique<const Document>(body, maximumDepth))
+    : document_(std::make_unique<const Document>(body, maximumDepth)), size_(body.size())
 {
     const Element message = messageOf(document_->root());
     id_ = message.attribute("ID");

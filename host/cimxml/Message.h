@@ -6,6 +6,7 @@
 
 #include "host/cimxml/WellFormed.h"
 
+#include <cstddef>
 #include <memory>
 #include <string>
 #include <string_view>
@@ -35,11 +36,15 @@ public:
     // Such as root/cimv2, as the client spells it.
     const std::string& nameSpace() const noexcept { return nameSpace_; }
 
+    // Of the body, in bytes.
+    std::size_t size() const noexcept { return size_; }
+
     // For the readers of this room.
     const Document& document() const noexcept { return *document_; }
 
 private:
     std::unique_ptr<const Document> document_;
+    std::size_t size_;
     std::string id_;
     std::string protocolVersion_;
     std::string methodName_;

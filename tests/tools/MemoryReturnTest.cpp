@@ -11,6 +11,7 @@
 
 #include <fstream>
 #include <memory>
+#include <stdexcept>
 #include <string>
 #include <thread>
 #include <vector>
@@ -34,7 +35,7 @@ private:
 };
 
 // Uses 64 MiB in small blocks, on a thread as workers are, and keeps the last of them, behind
-// which nothing can be given back.
+// which nothing can be given back. Throws instead of an answer of no objects.
 class WastefulHandler : public Host::CimXml::OperationHandler {
 public:
     explicit WastefulHandler(std::size_t objects) : objects_(objects) {}
@@ -48,11 +49,15 @@ public:
                 block = std::make_unique<char[]>(1024);
             made = std::make_unique<HeldAnswer>(objects_, std::move(blocks.back()));
         }).join();
-        return made;
+        if (objects_ > 0)
+            return made;
+        kept_ = std::move(made);
+        throw std::runtime_error("no answer");
     }
 
 private:
     std::size_t objects_;
+    std::unique_ptr<Answer> kept_;
 };
 
 std::size_t residentMegabytes()
@@ -64,15 +69,18 @@ std::size_t residentMegabytes()
 }
 
 // What is resident more once an answer of so many objects was dropped.
-std::size_t leftBehindBy(std::size_t objects)
+std::size_t leftBehindBy(
+    std::size_t objects, const std::string& body = Testing::cimCall("EnumerateClassNames"))
 {
     WastefulHandler handler(objects);
     Tools::MemoryReturn memoryReturn(handler);
-    const Host::CimXml::Message message(Testing::cimCall("EnumerateClassNames"));
+    const Host::CimXml::Message message(body);
     const std::size_t before = residentMegabytes();
-    auto answer = memoryReturn.answer(message, {});
-    EXPECT_EQ(answer->heldObjects(), objects);
-    answer.reset();
+    if (objects == 0) {
+        EXPECT_THROW(memoryReturn.answer(message, {}), std::runtime_error);
+    } else {
+        EXPECT_EQ(memoryReturn.answer(message, {})->heldObjects(), objects);
+    }
     const std::size_t after = residentMegabytes();
     return after > before ? after - before : 0;
 }
@@ -85,6 +93,21 @@ TEST(MemoryReturn, WhatLargeAnswersLeaveFreeGoesBackToTheSystem)
 TEST(MemoryReturn, SmallerAnswersKeepItForTheNext)
 {
     EXPECT_GT(leftBehindBy(9'999), 48U);
+}
+
+// A message with so many bytes, most of them around the call.
+std::string messageOf(std::size_t size)
+{
+    const std::string call = Testing::cimCall("EnumerateClassNames");
+    return call + std::string(size - call.size(), ' ');
+}
+
+TEST(MemoryReturn, WhatLargeMessagesLeaveFreeGoesBackToTheSystem)
+{
+    EXPECT_LT(leftBehindBy(1, messageOf(std::size_t{64} << 10)), 16U);
+    EXPECT_LT(leftBehindBy(0, messageOf(std::size_t{64} << 10)), 16U);
+    EXPECT_GT(leftBehindBy(1, messageOf((std::size_t{64} << 10) - 1)), 48U);
+    EXPECT_GT(leftBehindBy(0, messageOf((std::size_t{64} << 10) - 1)), 48U);
 }
 
 } // namespace MemoryReturnTests

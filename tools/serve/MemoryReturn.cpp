@@ -2,6 +2,8 @@
 
 #include "tools/serve/MemoryReturn.h"
 
+#include "host/cimxml/Message.h"
+
 #include <malloc.h>
 
 #include <utility>
@@ -15,6 +17,10 @@ using Host::CimXml::Answer;
 // Forty megabytes. To map them again takes a small part of the time that an answer of so many
 // takes.
 constexpr std::size_t largeAnswer = 10'000;
+
+// In bytes; clients' own messages have a few hundred. The tree of elements and what is read of it
+// take ten times as much and more.
+constexpr std::size_t largeMessage = std::size_t{64} << 10;
 
 class ReturningAnswer : public Answer {
 public:
@@ -39,8 +45,16 @@ private:
 std::unique_ptr<Answer> MemoryReturn::answer(
     const Host::CimXml::Message& message, const Host::CimXml::Caller& caller)
 {
-    auto answer = handler_.answer(message, caller);
-    if (answer->heldObjects() < largeAnswer)
+    const bool isLarge = message.size() >= largeMessage;
+    std::unique_ptr<Answer> answer;
+    try {
+        answer = handler_.answer(message, caller);
+    } catch (...) {
+        if (isLarge)
+            ::malloc_trim(0);
+        throw;
+    }
+    if (answer->heldObjects() < largeAnswer && !isLarge)
         return answer;
     return std::make_unique<ReturningAnswer>(std::move(answer));
 }

@@ -6,8 +6,9 @@
 
 namespace Tools {
 
-// Gives back to the system what is free when an answer of very many objects is dropped: the memory
-// that each worker freed for itself would stay, and add up until all of them had such an operation.
+// Gives back to the system what is free when the answer of very many objects, or to a very large
+// message, is dropped: the memory that each worker freed for itself would stay, and add up until
+// all of them had such an operation.
 class MemoryReturn : public Host::CimXml::OperationHandler {
 public:
     // The handler must outlive it.
