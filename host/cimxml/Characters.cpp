@@ -8,9 +8,9 @@ namespace Host::CimXml {
 
 namespace {
 
-constexpr char32_t Replacement = 0xFFFD;
+constexpr char32_t replacement = 0xFFFD;
 
-constexpr Character Invalid{Replacement, 1, false};
+constexpr Character invalidCharacter{replacement, 1, false};
 
 constexpr unsigned byteAt(std::string_view text, std::size_t at)
 {
@@ -36,7 +36,7 @@ constexpr std::string_view entityFor(char c)
 }
 
 // For each byte whether it is printable ASCII without an entity: what nearly all texts consist of.
-constexpr std::array<bool, 256> Plain = [] {
+constexpr std::array<bool, 256> plainBytes = [] {
     std::array<bool, 256> plain{};
     for (unsigned byte = ' '; byte <= '~'; ++byte)
         plain[byte] = entityFor(static_cast<char>(byte)).empty();
@@ -46,7 +46,7 @@ constexpr std::array<bool, 256> Plain = [] {
 std::size_t countPlain(std::string_view text)
 {
     std::size_t count = 0;
-    while (count < text.size() && Plain[byteAt(text, count)])
+    while (count < text.size() && plainBytes[byteAt(text, count)])
         ++count;
     return count;
 }
@@ -59,20 +59,20 @@ Character firstCharacter(std::string_view text)
     if (lead < 0x80)
         return {lead, 1, true};
     if (lead < 0xC2 || lead > 0xF4)
-        return Invalid;
+        return invalidCharacter;
     const std::size_t size = lead < 0xE0 ? 2 : lead < 0xF0 ? 3 : 4;
     if (text.size() < size)
-        return Invalid;
+        return invalidCharacter;
     char32_t code = lead & (0x7FU >> size);
     for (std::size_t at = 1; at < size; ++at) {
         if ((byteAt(text, at) & 0xC0U) != 0x80U)
-            return Invalid;
+            return invalidCharacter;
         code = code << 6U | (byteAt(text, at) & 0x3FU);
     }
     const bool isOverlong = (size == 3 && code < 0x800) || (size == 4 && code < 0x10000);
     const bool isSurrogate = code >= 0xD800 && code <= 0xDFFF;
     if (isOverlong || isSurrogate || code > 0x10FFFF)
-        return Invalid;
+        return invalidCharacter;
     return {code, size, true};
 }
 
@@ -120,7 +120,7 @@ void appendEscaped(std::string& out, std::string_view text)
         else if (character.isValid && isXmlCharacter(character.code))
             out += text.substr(0, character.size);
         else
-            appendUtf8(out, Replacement);
+            appendUtf8(out, replacement);
         text.remove_prefix(character.size);
     }
 }

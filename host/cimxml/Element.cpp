@@ -14,7 +14,7 @@ namespace Host::CimXml {
 namespace {
 
 // The names of the protocol, sorted.
-constexpr std::array<std::string_view, 68> KnownNames = {"CIM", "CLASS", "CLASSNAME", "CLASSPATH",
+constexpr std::array<std::string_view, 68> knownNames = {"CIM", "CLASS", "CLASSNAME", "CLASSPATH",
     "CORRELATOR", "DECLARATION", "DECLGROUP", "DECLGROUP.WITHNAME", "DECLGROUP.WITHPATH",
     "ENUMERATIONCONTEXT", "ERROR", "EXPMETHODCALL", "EXPMETHODRESPONSE", "EXPPARAMVALUE", "HOST",
     "IMETHODCALL", "IMETHODRESPONSE", "INSTANCE", "INSTANCENAME", "INSTANCEPATH", "IPARAMVALUE",
@@ -28,11 +28,11 @@ constexpr std::array<std::string_view, 68> KnownNames = {"CIM", "CLASS", "CLASSN
     "VALUE.NAMEDINSTANCE", "VALUE.NAMEDOBJECT", "VALUE.NULL", "VALUE.OBJECT",
     "VALUE.OBJECTWITHLOCALPATH", "VALUE.OBJECTWITHPATH", "VALUE.REFARRAY", "VALUE.REFERENCE",
     "VALUE.REFERENCEARRAY"};
-static_assert(std::is_sorted(KnownNames.begin(), KnownNames.end()));
+static_assert(std::is_sorted(knownNames.begin(), knownNames.end()));
 
 bool isKnown(std::string_view name)
 {
-    return std::binary_search(KnownNames.begin(), KnownNames.end(), name);
+    return std::binary_search(knownNames.begin(), knownNames.end(), name);
 }
 
 bool isText(const pugi::xml_node& node)

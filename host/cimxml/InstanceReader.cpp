@@ -66,8 +66,8 @@ const Instance& InstanceReader::instance(
     Instance& made = Instance::make(arena, *path, &classes_);
     const std::vector<Element> parts =
         element.children({"QUALIFIER", "PROPERTY", "PROPERTY.ARRAY", "PROPERTY.REFERENCE"});
-    if (parts.size() > MaximumUndeclared && declared == nullptr)
-        refuse("more than " + std::to_string(MaximumUndeclared) + " properties of class " +
+    if (parts.size() > maximumUndeclared && declared == nullptr)
+        refuse("more than " + std::to_string(maximumUndeclared) + " properties of class " +
                quotation(name) + ", which is not known");
     for (const Element& each : parts)
         if (!each.is("QUALIFIER"))

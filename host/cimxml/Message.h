@@ -21,7 +21,7 @@ class Message {
 public:
     // Throws RequestError for what is no such call, with the outcome to answer. Elements may stand
     // so deep in one another.
-    explicit Message(std::string_view body, std::size_t maximumDepth = MaximumDepth);
+    explicit Message(std::string_view body, std::size_t maximumDepth = usualDepth);
     ~Message();
     Message(Message&&) noexcept;
     Message& operator=(Message&&) noexcept;

@@ -12,7 +12,7 @@ namespace Host::CimXml {
 
 // Keys or properties of an object whose class is not known. Those of others are bounded by what the
 // class has; each is held against all before it.
-inline constexpr std::size_t MaximumUndeclared = 1000;
+inline constexpr std::size_t maximumUndeclared = 1000;
 
 // The IMETHODCALL or METHODCALL. REQUIRES: the document is a Message's.
 Element callOf(const Document& document);

@@ -37,7 +37,7 @@ public:
         for (const Element& child : call.children({"LOCALNAMESPACEPATH", "IPARAMVALUE"}))
             if (child.is("IPARAMVALUE"))
                 add(child);
-        for (std::size_t at = 0; at < ParameterCount; ++at)
+        for (std::size_t at = 0; at < parameterCount; ++at)
             if (form.required.has(static_cast<P>(at)) && !values_[at])
                 refuse(std::string(form.name) + " needs " + described(static_cast<P>(at)));
     }
@@ -94,10 +94,10 @@ private:
     {
         const std::string_view name = element.attribute("NAME");
         std::size_t at = 0;
-        while (at < ParameterCount && !equalNames(nameOf(static_cast<P>(at)), name))
+        while (at < parameterCount && !equalNames(nameOf(static_cast<P>(at)), name))
             ++at;
         const auto parameter = static_cast<P>(at);
-        if (at == ParameterCount ||
+        if (at == parameterCount ||
             !(form_.required.has(parameter) || form_.optional.has(parameter)))
             refuse(std::string(form_.name) + " has no parameter " + quotation(name));
         if (isGiven_[at])
@@ -124,8 +124,8 @@ private:
     }
 
     const OperationForm& form_;
-    std::array<bool, ParameterCount> isGiven_{};
-    std::array<std::optional<Element>, ParameterCount> values_;
+    std::array<bool, parameterCount> isGiven_{};
+    std::array<std::optional<Element>, parameterCount> values_;
 };
 
 class OperationReader {

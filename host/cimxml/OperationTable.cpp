@@ -14,61 +14,61 @@ using Kind = OperationKind;
 using P = Parameter;
 using Set = ParameterSet;
 
-constexpr Set Nothing;
-constexpr Set Association(P::assocClass, P::resultClass, P::role, P::resultRole);
-constexpr Set Reference(P::resultClass, P::role);
-constexpr Set Look(P::includeQualifiers, P::includeClassOrigin, P::propertyList);
-constexpr Set Opening(P::filterQuery, P::filterQueryLanguage, P::operationTimeout,
+constexpr Set nothing;
+constexpr Set association(P::assocClass, P::resultClass, P::role, P::resultRole);
+constexpr Set reference(P::resultClass, P::role);
+constexpr Set look(P::includeQualifiers, P::includeClassOrigin, P::propertyList);
+constexpr Set opening(P::filterQuery, P::filterQueryLanguage, P::operationTimeout,
     P::continueOnError, P::maxObjectCount);
-constexpr Set OpeningInstances = Opening | Set(P::includeClassOrigin, P::propertyList);
+constexpr Set openingInstances = opening | Set(P::includeClassOrigin, P::propertyList);
 
-constexpr std::array<OperationForm, 27> Forms = {{
-    {Kind::getInstance, "GetInstance", {P::instanceName}, Look | P::localOnly, {P::localOnly}},
+constexpr std::array<OperationForm, 27> forms = {{
+    {Kind::getInstance, "GetInstance", {P::instanceName}, look | P::localOnly, {P::localOnly}},
     {Kind::enumerateInstances, "EnumerateInstances", {P::className},
-        Look | Set(P::localOnly, P::deepInheritance), {P::localOnly, P::deepInheritance}},
-    {Kind::enumerateInstanceNames, "EnumerateInstanceNames", {P::className}, Nothing, Nothing},
-    {Kind::createInstance, "CreateInstance", {P::newInstance}, Nothing, Nothing},
+        look | Set(P::localOnly, P::deepInheritance), {P::localOnly, P::deepInheritance}},
+    {Kind::enumerateInstanceNames, "EnumerateInstanceNames", {P::className}, nothing, nothing},
+    {Kind::createInstance, "CreateInstance", {P::newInstance}, nothing, nothing},
     {Kind::modifyInstance, "ModifyInstance", {P::modifiedInstance},
         {P::includeQualifiers, P::propertyList}, {P::includeQualifiers}},
-    {Kind::deleteInstance, "DeleteInstance", {P::instanceName}, Nothing, Nothing},
-    {Kind::getProperty, "GetProperty", {P::instanceName, P::propertyName}, Nothing, Nothing},
-    {Kind::setProperty, "SetProperty", {P::instanceName, P::propertyName}, {P::newValue}, Nothing},
-    {Kind::execQuery, "ExecQuery", {P::queryLanguage, P::query}, Nothing, Nothing},
-    {Kind::associators, "Associators", {P::objectName}, Association | Look, Nothing},
-    {Kind::associatorNames, "AssociatorNames", {P::objectName}, Association, Nothing},
-    {Kind::references, "References", {P::objectName}, Reference | Look, Nothing},
-    {Kind::referenceNames, "ReferenceNames", {P::objectName}, Reference, Nothing},
-    {Kind::getClass, "GetClass", {P::className}, Look | P::localOnly,
+    {Kind::deleteInstance, "DeleteInstance", {P::instanceName}, nothing, nothing},
+    {Kind::getProperty, "GetProperty", {P::instanceName, P::propertyName}, nothing, nothing},
+    {Kind::setProperty, "SetProperty", {P::instanceName, P::propertyName}, {P::newValue}, nothing},
+    {Kind::execQuery, "ExecQuery", {P::queryLanguage, P::query}, nothing, nothing},
+    {Kind::associators, "Associators", {P::objectName}, association | look, nothing},
+    {Kind::associatorNames, "AssociatorNames", {P::objectName}, association, nothing},
+    {Kind::references, "References", {P::objectName}, reference | look, nothing},
+    {Kind::referenceNames, "ReferenceNames", {P::objectName}, reference, nothing},
+    {Kind::getClass, "GetClass", {P::className}, look | P::localOnly,
         {P::localOnly, P::includeQualifiers}},
-    {Kind::enumerateClasses, "EnumerateClasses", Nothing,
+    {Kind::enumerateClasses, "EnumerateClasses", nothing,
         {P::className, P::deepInheritance, P::localOnly, P::includeQualifiers,
             P::includeClassOrigin},
         {P::localOnly, P::includeQualifiers}},
-    {Kind::enumerateClassNames, "EnumerateClassNames", Nothing, {P::className, P::deepInheritance},
-        Nothing},
-    {Kind::getQualifier, "GetQualifier", {P::qualifierName}, Nothing, Nothing},
-    {Kind::enumerateQualifiers, "EnumerateQualifiers", Nothing, Nothing, Nothing},
+    {Kind::enumerateClassNames, "EnumerateClassNames", nothing, {P::className, P::deepInheritance},
+        nothing},
+    {Kind::getQualifier, "GetQualifier", {P::qualifierName}, nothing, nothing},
+    {Kind::enumerateQualifiers, "EnumerateQualifiers", nothing, nothing, nothing},
     {Kind::openEnumerateInstances, "OpenEnumerateInstances", {P::className},
-        OpeningInstances | P::deepInheritance, {P::deepInheritance}},
-    {Kind::openEnumerateInstancePaths, "OpenEnumerateInstancePaths", {P::className}, Opening,
-        Nothing},
+        openingInstances | P::deepInheritance, {P::deepInheritance}},
+    {Kind::openEnumerateInstancePaths, "OpenEnumerateInstancePaths", {P::className}, opening,
+        nothing},
     {Kind::openAssociatorInstances, "OpenAssociatorInstances", {P::instanceName},
-        OpeningInstances | Association, Nothing},
+        openingInstances | association, nothing},
     {Kind::openAssociatorInstancePaths, "OpenAssociatorInstancePaths", {P::instanceName},
-        Opening | Association, Nothing},
+        opening | association, nothing},
     {Kind::openReferenceInstances, "OpenReferenceInstances", {P::instanceName},
-        OpeningInstances | Reference, Nothing},
+        openingInstances | reference, nothing},
     {Kind::openReferenceInstancePaths, "OpenReferenceInstancePaths", {P::instanceName},
-        Opening | Reference, Nothing},
+        opening | reference, nothing},
     {Kind::pullInstancesWithPath, "PullInstancesWithPath",
-        {P::enumerationContext, P::maxObjectCount}, Nothing, Nothing},
+        {P::enumerationContext, P::maxObjectCount}, nothing, nothing},
     {Kind::pullInstancePaths, "PullInstancePaths", {P::enumerationContext, P::maxObjectCount},
-        Nothing, Nothing},
-    {Kind::closeEnumeration, "CloseEnumeration", {P::enumerationContext}, Nothing, Nothing},
+        nothing, nothing},
+    {Kind::closeEnumeration, "CloseEnumeration", {P::enumerationContext}, nothing, nothing},
 }};
 
 // In the order of Parameter.
-constexpr std::array<std::string_view, ParameterCount> ParameterNames = {"AssocClass", "ClassName",
+constexpr std::array<std::string_view, parameterCount> parameterNames = {"AssocClass", "ClassName",
     "ContinueOnError", "DeepInheritance", "EnumerationContext", "FilterQuery",
     "FilterQueryLanguage", "IncludeClassOrigin", "IncludeQualifiers", "InstanceName", "LocalOnly",
     "MaxObjectCount", "ModifiedInstance", "NewInstance", "NewValue", "ObjectName",
@@ -79,7 +79,7 @@ constexpr std::array<std::string_view, ParameterCount> ParameterNames = {"AssocC
 
 const OperationForm* findOperation(std::string_view name)
 {
-    for (const OperationForm& form : Forms)
+    for (const OperationForm& form : forms)
         if (equalNames(form.name, name))
             return &form;
     return nullptr;
@@ -87,7 +87,7 @@ const OperationForm* findOperation(std::string_view name)
 
 std::string_view nameOf(Parameter parameter)
 {
-    return ParameterNames[static_cast<std::size_t>(parameter)];
+    return parameterNames[static_cast<std::size_t>(parameter)];
 }
 
 } // namespace Host::CimXml

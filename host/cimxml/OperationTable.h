@@ -40,7 +40,7 @@ enum class Parameter : std::uint8_t {
     resultRole,
     role,
 };
-inline constexpr std::size_t ParameterCount = 25;
+inline constexpr std::size_t parameterCount = 25;
 
 class ParameterSet {
 public:

@@ -99,8 +99,8 @@ ObjectPath& PathReader::instance(
     ObjectPath& path = emptyPath(element, "CLASSNAME", nameSpace);
     const std::vector<Element> keys =
         element.children({"KEYBINDING", "KEYVALUE", "VALUE.REFERENCE"});
-    if (keys.size() > MaximumUndeclared && declaredClass(path) == nullptr)
-        refuse("more than " + std::to_string(MaximumUndeclared) + " keys of class " +
+    if (keys.size() > maximumUndeclared && declaredClass(path) == nullptr)
+        refuse("more than " + std::to_string(maximumUndeclared) + " keys of class " +
                quotation(path.className()) + ", which is not known");
     for (const Element& key : keys) {
         if (key.is("KEYBINDING")) {

@@ -13,7 +13,7 @@ namespace Host::CimXml {
 
 namespace {
 
-constexpr std::array<std::pair<Scope, const char*>, 7> ScopeAttributes = {{
+constexpr std::array<std::pair<Scope, const char*>, 7> scopeAttributes = {{
     {Scope::classes, "CLASS"},
     {Scope::association, "ASSOCIATION"},
     {Scope::reference, "REFERENCE"},
@@ -51,7 +51,7 @@ void writeFlavor(Markup& element, const Flavor& flavor)
 void writeScopes(std::string& out, const ScopeSet& scopes)
 {
     Markup element(out, "SCOPE");
-    for (const auto& [scope, name] : ScopeAttributes)
+    for (const auto& [scope, name] : scopeAttributes)
         if (scopes.has(scope))
             element.attribute(name, "true");
 }

@@ -231,8 +231,8 @@ private:
     {
         if (!isInElement() && elements_ != 0)
             fail("a second outermost element");
-        if (++elements_ > MaximumElements)
-            fail("more than " + std::to_string(MaximumElements) + " elements",
+        if (++elements_ > maximumElements)
+            fail("more than " + std::to_string(maximumElements) + " elements",
                 Outcome::requestNotValid);
         if (open_.size() == maximumDepth_)
             fail("elements more than " + std::to_string(maximumDepth_) + " deep in one another",
@@ -249,15 +249,15 @@ private:
 
     void attributes()
     {
-        std::array<std::string_view, MaximumAttributes> names;
+        std::array<std::string_view, maximumAttributes> names;
         std::size_t count = 0;
         while (skipWhiteSpace() && current() != '>' && current() != '/') {
             const std::string_view found = attribute().first;
             const auto* const end = names.begin() + count;
             if (std::find(names.cbegin(), end, found) != end)
                 fail("attribute " + quotation(found) + " comes twice");
-            if (count == MaximumAttributes)
-                fail("more than " + std::to_string(MaximumAttributes) + " attributes",
+            if (count == maximumAttributes)
+                fail("more than " + std::to_string(maximumAttributes) + " attributes",
                     Outcome::requestNotValid);
             names[count++] = found;
         }

@@ -12,21 +12,21 @@ namespace Host {
 
 namespace {
 
-constexpr const char* SystemClass = "ZUMLO_ComputerSystem";
-constexpr const char* ObjectManagerName = "sensor-profile";
+constexpr const char* systemClass = "ZUMLO_ComputerSystem";
+constexpr const char* objectManagerName = "sensor-profile";
 
 // The profile of sensors, DSP1009, in the version that the served classes follow.
-constexpr const char* ProfileId = "ZUMLO:DSP1009";
-constexpr const char* ProfileName = "Sensors";
-constexpr const char* ProfileVersion = "1.0.2";
+constexpr const char* profileId = "ZUMLO:DSP1009";
+constexpr const char* profileName = "Sensors";
+constexpr const char* profileVersion = "1.0.2";
 
 // Codes of the DMTF value maps.
-constexpr unsigned Enabled = 2;        // CIM_EnabledLogicalElement.EnabledState
-constexpr unsigned NotApplicable = 12; // .RequestedState: nobody can request one here
-constexpr unsigned Healthy = 5;        // CIM_ManagedSystemElement.HealthState
-constexpr unsigned Ok = 2;             // .OperationalStatus
-constexpr unsigned Dmtf = 2;           // CIM_RegisteredProfile.RegisteredOrganization
-constexpr unsigned NotAdvertised = 2;  // .AdvertiseTypes
+constexpr unsigned enabled = 2;        // CIM_EnabledLogicalElement.EnabledState
+constexpr unsigned notApplicable = 12; // .RequestedState: nobody can request one here
+constexpr unsigned healthy = 5;        // CIM_ManagedSystemElement.HealthState
+constexpr unsigned ok = 2;             // .OperationalStatus
+constexpr unsigned dmtf = 2;           // CIM_RegisteredProfile.RegisteredOrganization
+constexpr unsigned notAdvertised = 2;  // .AdvertiseTypes
 
 Value code(unsigned number)
 {
@@ -55,48 +55,48 @@ std::vector<const Instance*> InteropObjects::ofClass(std::string_view className)
 
 void InteropObjects::addObjectManager(const std::string& hostName)
 {
-    Instance& manager = add(ObjectManagerClass);
-    setText(manager, "SystemCreationClassName", SystemClass);
+    Instance& manager = add(objectManagerClass);
+    setText(manager, "SystemCreationClassName", systemClass);
     setText(manager, "SystemName", hostName);
-    setText(manager, "CreationClassName", ObjectManagerClass);
-    setText(manager, "Name", ObjectManagerName);
-    setText(manager, "ElementName", ObjectManagerName);
+    setText(manager, "CreationClassName", objectManagerClass);
+    setText(manager, "Name", objectManagerName);
+    setText(manager, "ElementName", objectManagerName);
     setText(manager, "Caption", "Object Manager");
     setText(manager, "Description", "The object manager that comes with the sensor provider.");
-    setCodes(manager, "OperationalStatus", Ok);
-    manager.setProperty("HealthState", code(Healthy));
-    manager.setProperty("EnabledState", code(Enabled));
-    manager.setProperty("RequestedState", code(NotApplicable));
+    setCodes(manager, "OperationalStatus", ok);
+    manager.setProperty("HealthState", code(healthy));
+    manager.setProperty("EnabledState", code(enabled));
+    manager.setProperty("RequestedState", code(notApplicable));
     manager.setProperty("Started", Value::boolean(true));
     manager.setProperty("GatherStatisticalData", Value::boolean(false));
 }
 
 void InteropObjects::addNamespace(const std::string& hostName, const std::string& name)
 {
-    Instance& nameSpace = add(NamespaceClass);
-    setText(nameSpace, "SystemCreationClassName", SystemClass);
+    Instance& nameSpace = add(namespaceClass);
+    setText(nameSpace, "SystemCreationClassName", systemClass);
     setText(nameSpace, "SystemName", hostName);
-    setText(nameSpace, "ObjectManagerCreationClassName", ObjectManagerClass);
-    setText(nameSpace, "ObjectManagerName", ObjectManagerName);
-    setText(nameSpace, "CreationClassName", NamespaceClass);
+    setText(nameSpace, "ObjectManagerCreationClassName", objectManagerClass);
+    setText(nameSpace, "ObjectManagerName", objectManagerName);
+    setText(nameSpace, "CreationClassName", namespaceClass);
     setText(nameSpace, "Name", name);
     setText(nameSpace, "ElementName", name);
 }
 
 void InteropObjects::addProfile()
 {
-    Instance& profile = add(RegisteredProfileClass);
-    setText(profile, "InstanceID", ProfileId);
-    setText(profile, "ElementName", ProfileName);
-    profile.setProperty("RegisteredOrganization", code(Dmtf));
-    setText(profile, "RegisteredName", ProfileName);
-    setText(profile, "RegisteredVersion", ProfileVersion);
-    setCodes(profile, "AdvertiseTypes", NotAdvertised);
+    Instance& profile = add(registeredProfileClass);
+    setText(profile, "InstanceID", profileId);
+    setText(profile, "ElementName", profileName);
+    profile.setProperty("RegisteredOrganization", code(dmtf));
+    setText(profile, "RegisteredName", profileName);
+    setText(profile, "RegisteredVersion", profileVersion);
+    setCodes(profile, "AdvertiseTypes", notAdvertised);
 }
 
 Instance& InteropObjects::add(const char* className)
 {
-    const ObjectPath& path = ObjectPath::make(arena_, InteropNameSpace, className);
+    const ObjectPath& path = ObjectPath::make(arena_, interopNameSpace, className);
     Instance& made = Instance::make(arena_, path, &classes_);
     objects_.push_back(&made);
     return made;

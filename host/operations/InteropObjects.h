@@ -16,10 +16,10 @@ namespace Host {
 class Instance;
 class Repository;
 
-inline constexpr const char* InteropNameSpace = "root/interop";
-inline constexpr const char* NamespaceClass = "CIM_Namespace";
-inline constexpr const char* ObjectManagerClass = "CIM_ObjectManager";
-inline constexpr const char* RegisteredProfileClass = "CIM_RegisteredProfile";
+inline constexpr const char* interopNameSpace = "root/interop";
+inline constexpr const char* namespaceClass = "CIM_Namespace";
+inline constexpr const char* objectManagerClass = "CIM_ObjectManager";
+inline constexpr const char* registeredProfileClass = "CIM_RegisteredProfile";
 
 // As they are at one moment.
 class InteropObjects {

@@ -13,8 +13,8 @@ namespace Host {
 
 namespace {
 
-constexpr CMPIStatus Success = {CMPI_RC_OK, nullptr};
-constexpr const char* ProviderName = "InteropProvider";
+constexpr CMPIStatus success = {CMPI_RC_OK, nullptr};
+constexpr const char* interopProviderName = "InteropProvider";
 
 InteropObjects objectsOf(const CMPIInstanceMI* mi)
 {
@@ -43,18 +43,18 @@ bool isAt(const Instance& object, const ObjectPath& target)
     });
 }
 
-const CMPIInstanceMIFT Functions = {
+const CMPIInstanceMIFT functions = {
     .ftVersion = CMPIVersion200,
     .miVersion = CMPIVersion200,
-    .miName = ProviderName,
-    .cleanup = [](CMPIInstanceMI*, const CMPIContext*, CMPIBoolean) { return Success; },
+    .miName = interopProviderName,
+    .cleanup = [](CMPIInstanceMI*, const CMPIContext*, CMPIBoolean) { return success; },
     .enumerateInstanceNames =
         [](CMPIInstanceMI* mi, const CMPIContext*, const CMPIResult* result,
             const CMPIObjectPath* target) {
             const InteropObjects objects = objectsOf(mi);
             for (const Instance* const object : objects.ofClass(classOf(target)))
                 result->ft->returnObjectPath(result, object->objectPath().handle());
-            return Success;
+            return success;
         },
     .enumerateInstances =
         [](CMPIInstanceMI* mi, const CMPIContext*, const CMPIResult* result,
@@ -62,7 +62,7 @@ const CMPIInstanceMIFT Functions = {
             const InteropObjects objects = objectsOf(mi);
             for (const Instance* const object : objects.ofClass(classOf(target)))
                 deliver(*object, result, properties);
-            return Success;
+            return success;
         },
     .getInstance =
         [](CMPIInstanceMI* mi, const CMPIContext*, const CMPIResult* result,
@@ -71,7 +71,7 @@ const CMPIInstanceMIFT Functions = {
             for (const Instance* const object : objects.ofClass(classOf(target)))
                 if (isAt(*object, *ObjectPath::of(target)))
                     deliver(*object, result, properties);
-            return Success;
+            return success;
         },
     .createInstance = nullptr, // what is left out is not supported
     .modifyInstance = nullptr,
@@ -82,22 +82,22 @@ const CMPIInstanceMIFT Functions = {
 } // namespace
 
 InteropProvider::InteropProvider(const Repository& classes, HostName hostName)
-    : classes_(classes), hostName_(std::move(hostName)), mi_{this, &Functions}
+    : classes_(classes), hostName_(std::move(hostName)), mi_{this, &functions}
 {
 }
 
 std::vector<ProviderRegistration> InteropProvider::registrations()
 {
     std::vector<ProviderRegistration> all;
-    for (const char* const className : {ObjectManagerClass, NamespaceClass, RegisteredProfileClass})
-        all.push_back({className, ProviderName, {}, true, false});
+    for (const char* const className : {objectManagerClass, namespaceClass, registeredProfileClass})
+        all.push_back({className, interopProviderName, {}, true, false});
     return all;
 }
 
 CMPIInstanceMI& ProvidersWithInterop::instanceMI(const ProviderRegistration& registration)
 {
-    return registration.providerName == ProviderName ? interop_.instanceMI()
-                                                     : loaded_.instanceMI(registration);
+    return registration.providerName == interopProviderName ? interop_.instanceMI()
+                                                            : loaded_.instanceMI(registration);
 }
 
 CMPIAssociationMI& ProvidersWithInterop::associationMI(const ProviderRegistration& registration)

@@ -33,7 +33,7 @@ std::string makeContext()
 
 [[noreturn]] void refuseContext()
 {
-    throw Refusal(InvalidEnumerationContext,
+    throw Refusal(invalidEnumerationContext,
         "no such enumeration is open: it was pulled to its end, closed, or not used for too long");
 }
 

@@ -60,7 +60,7 @@ public:
     };
 
     // So many of the objects that wait. Its time begins anew. Throw Refusal
-    // (InvalidEnumerationContext) when there is no such enumeration of this owner.
+    // (invalidEnumerationContext) when there is no such enumeration of this owner.
     Pulled pull(const std::string& context, const EnumerationOwner& owner, std::size_t count);
     // Whatever the owner pulls.
     void close(const std::string& context, const EnumerationOwner& owner);

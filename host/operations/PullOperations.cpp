@@ -54,13 +54,13 @@ void PullOperations::checkOpening(const Operation& operation) const
 {
     if (!operation.query.empty() || !operation.queryLanguage.empty())
         throw Refusal(
-            FilteredEnumerationNotSupported, "enumerations cannot be filtered by a query");
+            filteredEnumerationNotSupported, "enumerations cannot be filtered by a query");
     if (operation.continueOnError)
-        throw Refusal(ContinuationOnErrorNotSupported, "an enumeration ends with its first error");
+        throw Refusal(continuationOnErrorNotSupported, "an enumeration ends with its first error");
     const auto longest = static_cast<std::uint64_t>(limits_.maximumTimeout.count());
     const std::uint64_t wanted = operation.operationTimeout.value_or(1);
     if (wanted == 0 || wanted > longest)
-        throw Refusal(InvalidOperationTimeout, "parameter OperationTimeout: must be from 1 to " +
+        throw Refusal(invalidOperationTimeout, "parameter OperationTimeout: must be from 1 to " +
                                                    std::to_string(longest) + " seconds, not " +
                                                    std::to_string(wanted));
 }

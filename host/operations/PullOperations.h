@@ -20,9 +20,9 @@ public:
 
     static bool isOpening(CimXml::OperationKind kind);
 
-    // To be called before anything is enumerated. Throws Refusal: FilteredEnumerationNotSupported
-    // for a filter, ContinuationOnErrorNotSupported when the client wants to go on after errors,
-    // InvalidOperationTimeout for a time that is too long, or for the 0 that stands for ever.
+    // To be called before anything is enumerated. Throws Refusal: filteredEnumerationNotSupported
+    // for a filter, continuationOnErrorNotSupported when the client wants to go on after errors,
+    // invalidOperationTimeout for a time that is too long, or for the 0 that stands for ever.
     void checkOpening(const CimXml::Operation& operation) const;
 
     // Leaves in the answer what the client wants at once and keeps the rest for it. Throws what

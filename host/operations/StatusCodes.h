@@ -8,9 +8,9 @@
 
 namespace Host {
 
-inline constexpr auto InvalidEnumerationContext = static_cast<CMPIrc>(21);
-inline constexpr auto InvalidOperationTimeout = static_cast<CMPIrc>(22);
-inline constexpr auto FilteredEnumerationNotSupported = static_cast<CMPIrc>(25);
-inline constexpr auto ContinuationOnErrorNotSupported = static_cast<CMPIrc>(26);
+inline constexpr auto invalidEnumerationContext = static_cast<CMPIrc>(21);
+inline constexpr auto invalidOperationTimeout = static_cast<CMPIrc>(22);
+inline constexpr auto filteredEnumerationNotSupported = static_cast<CMPIrc>(25);
+inline constexpr auto continuationOnErrorNotSupported = static_cast<CMPIrc>(26);
 
 } // namespace Host

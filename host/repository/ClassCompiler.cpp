@@ -15,7 +15,7 @@ namespace Host {
 
 namespace {
 
-constexpr std::size_t MaximumDepth = 64; // of a class below its root
+constexpr std::size_t maximumDepth = 64; // of a class below its root
 
 // How the type is called in messages: a reference by its class.
 std::string describe(const Syntax::Type& type)
@@ -60,9 +60,9 @@ private:
             throw MofError(name.position, "superclass " + name.text + " is not declared");
         std::size_t depth = 0;
         for (auto above = declared_->superclass; above != nullptr; above = above->superclass)
-            if (++depth > MaximumDepth)
+            if (++depth > maximumDepth)
                 throw MofError(name.position, "class " + declared_->name + " has more than " +
-                                                  std::to_string(MaximumDepth) + " ancestors");
+                                                  std::to_string(maximumDepth) + " ancestors");
     }
 
     void setQualifiers()

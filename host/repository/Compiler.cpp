@@ -15,9 +15,9 @@ namespace Host {
 
 namespace {
 
-constexpr std::size_t MaximumIncludeDepth = 16;
-constexpr std::size_t MaximumIncludes = 4096;
-constexpr std::size_t MaximumNamespaces = 256;
+constexpr std::size_t maximumIncludeDepth = 16;
+constexpr std::size_t maximumIncludes = 4096;
+constexpr std::size_t maximumNamespaces = 256;
 
 // What would break the line of a message that shows the name.
 bool hasControlCharacter(std::string_view name)
@@ -94,7 +94,7 @@ private:
             throw MofError(
                 pragma.argumentPosition, quotation(pragma.argument) + " is no name of a namespace");
         nameSpace_ = &compiler_.openNamespace(name);
-        if (compiler_.namespaces_.size() > MaximumNamespaces)
+        if (compiler_.namespaces_.size() > maximumNamespaces)
             throw MofError(pragma.argumentPosition, "too many namespaces");
     }
 
@@ -110,7 +110,7 @@ private:
         const auto& open = compiler_.open_;
         if (std::find(open.begin(), open.end(), identityOf(included)) != open.end())
             fail("includes itself");
-        if (open.size() > MaximumIncludeDepth || ++compiler_.includes_ > MaximumIncludes)
+        if (open.size() > maximumIncludeDepth || ++compiler_.includes_ > maximumIncludes)
             fail("too many files are included");
         std::string text;
         try {

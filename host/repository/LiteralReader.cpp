@@ -122,8 +122,8 @@ private:
 
     char32_t hexadecimal(std::size_t begin)
     {
-        constexpr std::size_t MaximumDigits = 4;
-        const std::string_view digits = quote_.text.substr(at_, MaximumDigits);
+        constexpr std::size_t maximumDigits = 4;
+        const std::string_view digits = quote_.text.substr(at_, maximumDigits);
         unsigned unit = 0;
         const auto end =
             std::from_chars(digits.data(), digits.data() + digits.size(), unit, 16).ptr;

@@ -8,7 +8,7 @@ namespace Host {
 
 namespace {
 
-constexpr std::size_t MaximumQuote = 40;
+constexpr std::size_t maximumQuote = 40;
 
 } // namespace
 
@@ -26,19 +26,19 @@ std::string toText(const SourcePosition& position)
 
 std::string quotation(std::string_view text)
 {
-    constexpr std::string_view Digits = "0123456789abcdef";
+    constexpr std::string_view digits = "0123456789abcdef";
     std::string quote = "\"";
-    for (const char c : text.substr(0, MaximumQuote)) {
+    for (const char c : text.substr(0, maximumQuote)) {
         const auto byte = static_cast<unsigned char>(c);
         if (byte < 0x20 || byte >= 0x7F) {
             quote += "\\x";
-            quote += Digits[byte >> 4U];
-            quote += Digits[byte & 0xFU];
+            quote += digits[byte >> 4U];
+            quote += digits[byte & 0xFU];
         } else {
             quote += c;
         }
     }
-    return quote + (text.size() > MaximumQuote ? "...\"" : "\"");
+    return quote + (text.size() > maximumQuote ? "...\"" : "\"");
 }
 
 } // namespace Host

@@ -13,7 +13,7 @@ namespace Host {
 
 namespace {
 
-constexpr std::size_t MaximumQualifiers = 256; // of one element
+constexpr std::size_t maximumQualifiers = 256; // of one element
 
 // Which of two flavors that exclude each other was written.
 class Choice {
@@ -100,9 +100,9 @@ QualifierList ownQualifiers(
     QualifierList own;
     for (const Syntax::Qualifier& each : written) {
         const SourcePosition& position = each.name.position;
-        if (own.size() == MaximumQualifiers)
+        if (own.size() == maximumQualifiers)
             throw MofError(position,
-                "more than " + std::to_string(MaximumQualifiers) + " qualifiers on one element");
+                "more than " + std::to_string(maximumQualifiers) + " qualifiers on one element");
         Qualifier qualifier;
         qualifier.declaration = nameSpace.findQualifier(each.name.text);
         if (qualifier.declaration == nullptr)

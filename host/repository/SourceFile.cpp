@@ -56,18 +56,18 @@ std::string readSourceFile(const std::filesystem::path& file)
     if (descriptor.get() < 0)
         failWithErrno();
     requireRegular(descriptor.get());
-    constexpr std::size_t Step = std::size_t{64} << 10U;
+    constexpr std::size_t step = std::size_t{64} << 10U;
     std::string text;
     for (;;) {
         const std::size_t size = text.size();
-        text.resize(size + Step);
-        const ssize_t count = ::read(descriptor.get(), text.data() + size, Step);
+        text.resize(size + step);
+        const ssize_t count = ::read(descriptor.get(), text.data() + size, step);
         if (count < 0 && errno != EINTR)
             failWithErrno();
         text.resize(size + static_cast<std::size_t>(count < 0 ? 0 : count));
         if (count == 0)
             return text;
-        if (text.size() > MaximumSourceSize)
+        if (text.size() > maximumSourceSize)
             throw std::runtime_error("is larger than 4 MiB");
     }
 }

@@ -11,7 +11,7 @@
 
 namespace Host {
 
-inline constexpr std::size_t MaximumSourceSize = std::size_t{4} << 20U;
+inline constexpr std::size_t maximumSourceSize = std::size_t{4} << 20U;
 
 // Gives the text of a file; throws std::runtime_error with the reason alone when it cannot.
 using SourceReader = std::function<std::string(const std::filesystem::path& file)>;

@@ -17,7 +17,7 @@ struct Word {
     Meaning meaning;
 };
 
-constexpr std::array<Word<CMPIType>, 15> DataTypes = {{
+constexpr std::array<Word<CMPIType>, 15> dataTypeWords = {{
     {"uint8", CMPI_uint8},
     {"uint16", CMPI_uint16},
     {"uint32", CMPI_uint32},
@@ -35,7 +35,7 @@ constexpr std::array<Word<CMPIType>, 15> DataTypes = {{
     {"ref", CMPI_ref},
 }};
 
-constexpr std::array<Word<Scope>, 10> Scopes = {{
+constexpr std::array<Word<Scope>, 10> scopeWords = {{
     {"schema", Scope::schema},
     {"class", Scope::classes},
     {"association", Scope::association},
@@ -48,7 +48,7 @@ constexpr std::array<Word<Scope>, 10> Scopes = {{
     {"any", Scope::any},
 }};
 
-constexpr std::array<Word<FlavorChange>, 5> Flavors = {{
+constexpr std::array<Word<FlavorChange>, 5> flavorWords = {{
     {"EnableOverride", FlavorChange::enableOverride},
     {"DisableOverride", FlavorChange::disableOverride},
     {"ToSubclass", FlavorChange::toSubclass},
@@ -78,28 +78,28 @@ std::string_view textOf(const Words& words, Meaning meaning)
 
 CMPIType dataTypeNamed(std::string_view word)
 {
-    return meaningOf(DataTypes, word, CMPIType{CMPI_null});
+    return meaningOf(dataTypeWords, word, CMPIType{CMPI_null});
 }
 
 Scope scopeNamed(std::string_view word)
 {
-    return meaningOf(Scopes, word, Scope::any);
+    return meaningOf(scopeWords, word, Scope::any);
 }
 
 FlavorChange flavorNamed(std::string_view word)
 {
-    return meaningOf(Flavors, word, FlavorChange::enableOverride);
+    return meaningOf(flavorWords, word, FlavorChange::enableOverride);
 }
 
 std::string nameOfType(CMPIType type)
 {
-    const std::string_view name = textOf(DataTypes, elementType(type));
+    const std::string_view name = textOf(dataTypeWords, elementType(type));
     return std::string(name) + (isArrayType(type) ? "[]" : "");
 }
 
 std::string_view nameOfScope(Scope scope)
 {
-    return textOf(Scopes, scope);
+    return textOf(scopeWords, scope);
 }
 
 } // namespace Host

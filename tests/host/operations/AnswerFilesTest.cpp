@@ -112,7 +112,7 @@ TEST(AnswerFiles, coverEveryOperationWithEachOfItsParameters)
         EXPECT_NE(texts, "") << operation;
         const auto* const form = Host::CimXml::findOperation(operation);
         ASSERT_NE(form, nullptr) << operation;
-        for (std::size_t at = 0; at < Host::CimXml::ParameterCount; ++at) {
+        for (std::size_t at = 0; at < Host::CimXml::parameterCount; ++at) {
             const auto parameter = static_cast<Parameter>(at);
             const std::string name(nameOf(parameter));
             if (form->required.has(parameter) || form->optional.has(parameter)) {

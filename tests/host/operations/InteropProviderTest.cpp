@@ -28,7 +28,7 @@ protected:
     {
         Host::CollectedResult answer;
         manager_.enumerateInstances(request_.context(),
-            request_.makePath(Host::InteropNameSpace, Host::RegisteredProfileClass), properties,
+            request_.makePath(Host::interopNameSpace, Host::registeredProfileClass), properties,
             answer);
         EXPECT_EQ(answer.instances().size(), 1U);
         std::vector<std::string> names;
@@ -50,7 +50,7 @@ protected:
 
     Host::ObjectPath& profilePath(const char* key, std::string_view value)
     {
-        auto& path = request_.makePath(Host::InteropNameSpace, Host::RegisteredProfileClass);
+        auto& path = request_.makePath(Host::interopNameSpace, Host::registeredProfileClass);
         path.addKey(key, Host::Value::text(request_.arena(), value));
         return path;
     }
@@ -86,15 +86,15 @@ TEST_F(InteropProviderTest, anObjectIsFoundByAllItsKeys)
 {
     EXPECT_TRUE(isFound(profilePath("INSTANCEID", "ZUMLO:DSP1009")));
     EXPECT_FALSE(isFound(profilePath("InstanceID", "zumlo:dsp1009")));
-    EXPECT_FALSE(isFound(request_.makePath(Host::InteropNameSpace, Host::RegisteredProfileClass)));
-    EXPECT_FALSE(isFound(request_.makePath(Host::InteropNameSpace, Host::NamespaceClass)));
+    EXPECT_FALSE(isFound(request_.makePath(Host::interopNameSpace, Host::registeredProfileClass)));
+    EXPECT_FALSE(isFound(request_.makePath(Host::interopNameSpace, Host::namespaceClass)));
 }
 
 TEST_F(InteropProviderTest, thereIsOneNamespaceObjectForEachNamespace)
 {
     Host::CollectedResult answer;
     manager_.enumerateInstanceNames(request_.context(),
-        request_.makePath(Host::InteropNameSpace, Host::NamespaceClass), answer);
+        request_.makePath(Host::interopNameSpace, Host::namespaceClass), answer);
     std::vector<std::string> names;
     for (const Host::ObjectPath* const path : answer.paths())
         names.emplace_back(*path->key("Name")->text());
@@ -106,24 +106,24 @@ TEST_F(InteropProviderTest, theSystemIsNamedAsItIsNow)
     const auto systemName = [&](const char* className) {
         Host::CollectedResult answer;
         manager_.enumerateInstances(request_.context(),
-            request_.makePath(Host::InteropNameSpace, className), nullptr, answer);
+            request_.makePath(Host::interopNameSpace, className), nullptr, answer);
         return std::string(*answer.instances().at(0)->property("SystemName")->text());
     };
-    EXPECT_EQ(systemName(Host::ObjectManagerClass), "host.example");
+    EXPECT_EQ(systemName(Host::objectManagerClass), "host.example");
     hostName_ = "renamed.example";
-    EXPECT_EQ(systemName(Host::ObjectManagerClass), "renamed.example");
-    EXPECT_EQ(systemName(Host::NamespaceClass), "renamed.example");
+    EXPECT_EQ(systemName(Host::objectManagerClass), "renamed.example");
+    EXPECT_EQ(systemName(Host::namespaceClass), "renamed.example");
 }
 
 TEST_F(InteropProviderTest, everyPropertyIsDeclaredWithItsType)
 {
     Host::CollectedResult answer;
     manager_.enumerateInstances(request_.context(),
-        request_.makePath(Host::InteropNameSpace, "CIM_ManagedElement"), nullptr, answer);
+        request_.makePath(Host::interopNameSpace, "CIM_ManagedElement"), nullptr, answer);
     EXPECT_EQ(answer.instances().size(), 4U);
     for (const Host::Instance* const instance : answer.instances()) {
         const auto* const declared =
-            classes_->findClass(Host::InteropNameSpace, instance->className());
+            classes_->findClass(Host::interopNameSpace, instance->className());
         ASSERT_NE(declared, nullptr);
         for (const Host::NamedValue& each : instance->properties()) {
             const auto* const property = declared->property(*each.name->text());
