@@ -30,10 +30,12 @@ HttpError unauthorized()
         {{"WWW-Authenticate", R"(Basic realm="sensor-profile", charset="UTF-8")"}}};
 }
 
-HttpError overloaded()
+HttpError unavailable(const std::string& reason)
 {
-    return {Status::unavailable, "too many requests are waiting", {}, {{"Retry-After", "1"}}};
+    return {Status::unavailable, reason, {}, {{"Retry-After", "1"}}};
 }
+
+constexpr const char* ending = "the server is ending";
 
 } // namespace
 
@@ -67,7 +69,7 @@ void Exchange::signIn(const RequestHead& head)
     if (service_.signIns.isKnown(*credentials, client_.address, now))
         return;
     if (!service_.connections.mayFallAsleep())
-        throw overloaded();
+        throw unavailable(ending);
     service_.connections.enter(client_, Phase::working);
     fallAsleep(State::signingIn);
     tryPasswordAt(service_.signIns.admission(client_.neighbourhood, now), *credentials);
@@ -100,7 +102,7 @@ void Exchange::tryPassword(const Credentials& credentials)
         if (admission > now && !service_.connections.isWindingUp())
             return tryPasswordAt(admission, credentials);
         if (admission > now) {
-            error_ = overloaded();
+            error_ = unavailable(ending);
             return wakeUp();
         }
         const auto refusal =
@@ -175,7 +177,7 @@ bool Exchange::receive(std::string_view piece)
 bool Exchange::startWork()
 {
     if (!service_.connections.mayFallAsleep()) {
-        error_ = overloaded();
+        error_ = unavailable(ending);
         return sendError();
     }
     service_.connections.enter(client_, Phase::working);
@@ -233,7 +235,7 @@ void Exchange::handOver(std::function<void()> job) noexcept
     try {
         if (service_.workers.take(std::move(job)))
             return;
-        error_ = overloaded();
+        error_ = unavailable("too many requests are waiting");
     } catch (...) {
         isLost_ = true;
     }
