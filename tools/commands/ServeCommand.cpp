@@ -204,8 +204,8 @@ public:
             requireReadable(*files.computerSystem);
 
         Host::ObjectManager objects(*classes,
-            Host::sensorProfileProviders(files.sensors, files.computerSystem),
-            Vorn::getSystemName, options_.operations);
+            Host::sensorProfileProviders(files.sensors, files.computerSystem), Vorn::getSystemName,
+            options_.operations);
         MemoryReturn operations(objects);
         objects.manager().preload();
         if (Host::Http::isRoot() && options_.user != "root")
