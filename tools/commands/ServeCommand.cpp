@@ -92,8 +92,10 @@ void requireReadable(const std::string& file)
     if (::access(file.c_str(), R_OK) == 0)
         return;
     const std::error_code reason(errno, std::system_category());
-    throw std::system_error(
-        reason, file + ", which the server needs as the user it runs as (--user names another)");
+    throw std::system_error(reason,
+        reason == std::errc::permission_denied
+            ? file + ", which the server needs as the user it runs as (--user names another)"
+            : file);
 }
 
 // Of the machine that is served, be they given by an option or by the environment.
@@ -199,10 +201,6 @@ public:
         auto sockets = Host::Http::listenOn(endpoints);
         const auto classes = compileClasses();
         const ProviderFiles files = source_.providerFiles();
-        requireReadable(files.sensors);
-        if (files.computerSystem)
-            requireReadable(*files.computerSystem);
-
         Host::ObjectManager objects(*classes,
             Host::sensorProfileProviders(files.sensors, files.computerSystem), Vorn::getSystemName,
             options_.operations);
