@@ -106,9 +106,7 @@ void Exchange::tryPassword(const Credentials& credentials)
             return wakeUp();
         }
         const auto refusal =
-            signIns.areDemanded()
-                ? signIns.tryPassword(credentials, client_.address, client_.neighbourhood, now)
-                : std::nullopt;
+            signIns.tryPassword(credentials, client_.address, client_.neighbourhood, now);
         if (!refusal)
             return wakeUp();
         error_ = unauthorized();

@@ -26,6 +26,8 @@ std::optional<SignIns::Time> SignIns::tryPassword(const Credentials& credentials
     const std::string& address, const std::string& neighbourhood, Time now)
 {
     const auto current = passwords();
+    if (!current)
+        return std::nullopt;
     if (!current->matches(credentials.user, credentials.password)) {
         report({"tryPassword", "SignIns", __LINE__},
             "wrong password for \"" + credentials.user + "\" from " + address);

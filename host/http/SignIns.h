@@ -45,10 +45,10 @@ public:
     {
         return delays_.admit(neighbourhood, now);
     }
-    // Takes long. Nothing when the password is right; for a wrong one, when the client may hear of
-    // it. Both go to the log with the address, the right one when it was not known. The time is
-    // counted from now, the beginning, so that it does not tell how long the user's hash took.
-    // REQUIRES: areDemanded().
+    // Takes long. Nothing when the password is right, or none is demanded any more; for a wrong
+    // one, when the client may hear of it. Both go to the log with the address, the right one when
+    // it was not known. The time is counted from now, the beginning, so that it does not tell how
+    // long the user's hash took.
     std::optional<Time> tryPassword(const Credentials& credentials, const std::string& address,
         const std::string& neighbourhood, Time now);
 

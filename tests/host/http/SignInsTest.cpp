@@ -111,6 +111,13 @@ TEST(SignInsTest, RefusalsAreTimedFromTheBeginning)
     EXPECT_EQ(signIns.tryPassword({"ann", "secret"}, "address", "ann", start), std::nullopt);
 }
 
+TEST(SignInsTest, NobodyIsRefusedOnceNoPasswordIsDemanded)
+{
+    Host::Http::SignIns signIns(nullptr, 1s);
+    EXPECT_FALSE(signIns.areDemanded());
+    EXPECT_EQ(signIns.tryPassword({"ann", "wrong"}, "a", "a", {}), std::nullopt);
+}
+
 } // namespace
 
 } // namespace HttpTests
