@@ -3,8 +3,8 @@
 #include "host/cimxml/InstanceReader.h"
 
 #include "host/broker/Array.h"
-#include "host/broker/Refusal.h"
 #include "host/broker/Types.h"
+#include "host/cimxml/InvalidParameter.h"
 #include "host/cimxml/Literal.h"
 #include "host/cimxml/MessageParts.h"
 #include "host/repository/MofError.h"
@@ -13,11 +13,6 @@
 namespace Host::CimXml {
 
 namespace {
-
-[[noreturn]] void refuse(const std::string& reason)
-{
-    throw Refusal(CMPI_RC_ERR_INVALID_PARAMETER, reason);
-}
 
 Value literal(CMPIType type, const Element& element, const std::string& what)
 {

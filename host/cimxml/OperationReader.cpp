@@ -4,6 +4,7 @@
 #include "host/broker/ObjectPath.h"
 #include "host/broker/Refusal.h"
 #include "host/cimxml/InstanceReader.h"
+#include "host/cimxml/InvalidParameter.h"
 #include "host/cimxml/Literal.h"
 #include "host/cimxml/Message.h"
 #include "host/cimxml/MessageParts.h"
@@ -18,11 +19,6 @@ namespace Host::CimXml {
 namespace {
 
 using P = Parameter;
-
-[[noreturn]] void refuse(const std::string& reason)
-{
-    throw Refusal(CMPI_RC_ERR_INVALID_PARAMETER, reason);
-}
 
 std::string described(Parameter parameter)
 {

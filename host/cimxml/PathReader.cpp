@@ -5,6 +5,7 @@
 #include "host/broker/Arena.h"
 #include "host/broker/Names.h"
 #include "host/broker/Refusal.h"
+#include "host/cimxml/InvalidParameter.h"
 #include "host/cimxml/Literal.h"
 #include "host/cimxml/MessageParts.h"
 #include "host/repository/MofError.h"
@@ -13,11 +14,6 @@
 namespace Host::CimXml {
 
 namespace {
-
-[[noreturn]] void refuse(const std::string& reason)
-{
-    throw Refusal(CMPI_RC_ERR_INVALID_PARAMETER, reason);
-}
 
 // The type a KEYVALUE itself names; CMPI_null for a number of any type.
 CMPIType namedType(const Element& element, const std::string& what)

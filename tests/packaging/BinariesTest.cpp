@@ -11,7 +11,7 @@
 #include <regex>
 #include <set>
 
-namespace {
+namespace BinariesTests {
 
 using testing::Contains;
 using testing::HasSubstr;
@@ -109,4 +109,4 @@ TEST(InstalledLibrary, needsNothingOfTheServer)
     EXPECT_THAT(neededLibraries(systemLibrary), IsSubsetOf(forSystems));
 }
 
-} // namespace
+} // namespace BinariesTests

@@ -7,7 +7,7 @@
 
 #include <gmock/gmock.h>
 
-namespace {
+namespace CompletionTests {
 
 using testing::Contains;
 using testing::Each;
@@ -61,4 +61,4 @@ TEST(Completion, offersNoFilesForOtherThings)
     EXPECT_THAT(offersFor({"serve", "--port", "/etc/host"}), testing::IsEmpty());
 }
 
-} // namespace
+} // namespace CompletionTests

@@ -8,7 +8,7 @@
 
 #include <gmock/gmock.h>
 
-namespace {
+namespace InstallTests {
 
 using nlohmann::json;
 using testing::AllOf;
@@ -299,4 +299,4 @@ TEST(Installed, nothingNamesTheBuildTheSourcesOrTheFirstPrefix)
     }
 }
 
-} // namespace
+} // namespace InstallTests

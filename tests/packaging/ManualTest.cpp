@@ -11,7 +11,7 @@
 #include <regex>
 #include <set>
 
-namespace {
+namespace ManualTests {
 
 using testing::HasSubstr;
 using namespace Testing;
@@ -249,4 +249,4 @@ TEST(OperationsPage, tellsOfEveryProperty)
     EXPECT_GT(properties, 40U);
 }
 
-} // namespace
+} // namespace ManualTests

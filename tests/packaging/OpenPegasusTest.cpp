@@ -6,7 +6,7 @@
 
 #include <csignal>
 
-namespace {
+namespace OpenPegasusTests {
 
 using testing::AllOf;
 using testing::ElementsAre;
@@ -285,4 +285,4 @@ TEST_F(OpenPegasus, aFirstRegistrationThatFailsSpeaksOfNoEarlierOne)
     EXPECT_THAT(runRegister({"register"}).err, Not(HasSubstr("registered before")));
 }
 
-} // namespace
+} // namespace OpenPegasusTests

@@ -8,7 +8,7 @@
 
 #include <gmock/gmock.h>
 
-namespace {
+namespace PackageTests {
 
 using testing::AllOf;
 using testing::HasSubstr;
@@ -109,4 +109,4 @@ TEST(Scripts, areFreeOfWarnings)
     EXPECT_EQ(complaints, "passed\n");
 }
 
-} // namespace
+} // namespace PackageTests

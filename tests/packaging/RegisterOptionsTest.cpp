@@ -4,7 +4,7 @@
 
 #include "tests/packaging/RegisterTest.h"
 
-namespace {
+namespace RegisterOptionsTests {
 
 using testing::HasSubstr;
 using testing::IsEmpty;
@@ -87,4 +87,4 @@ TEST_F(BothObjectManagers, areChosenByName)
     EXPECT_EQ(calls().at(0), "cimprovider -l");
 }
 
-} // namespace
+} // namespace RegisterOptionsTests

@@ -12,7 +12,7 @@
 #include <regex>
 #include <set>
 
-namespace {
+namespace RegistrationTests {
 
 using testing::UnorderedElementsAreArray;
 
@@ -141,4 +141,4 @@ TEST(RegistrationMof, saysWhatTheEmbeddedManagerKnows)
     EXPECT_THAT(registrations, UnorderedElementsAreArray(embeddedTable()));
 }
 
-} // namespace
+} // namespace RegistrationTests

@@ -6,7 +6,7 @@
 
 #include <unistd.h>
 
-namespace {
+namespace SfcbTests {
 
 using testing::AllOf;
 using testing::ElementsAre;
@@ -307,4 +307,4 @@ TEST_P(EveryRemovalStepOfSfcb, canFailAndBeRepeated)
 
 INSTANTIATE_TEST_SUITE_P(Steps, EveryRemovalStepOfSfcb, testing::Range<std::size_t>(0, 4));
 
-} // namespace
+} // namespace SfcbTests
