@@ -3,6 +3,7 @@
 // The server and what is around its process: where its output and its log go, who started it and
 // whom it serves as.
 
+#include "tests/support/Requirement.h"
 #include "tests/tools/ServeTest.h"
 
 #include <gmock/gmock.h>
@@ -179,12 +180,10 @@ TEST_F(ServeProcessTest, ServiceManagerIsToldWhatItDoes)
 TEST_F(ServeProcessTest, RootIsRenounced)
 {
     if (::geteuid() != 0)
-        GTEST_SKIP() << "only root can renounce root";
-    const std::string model = SENSOR_PROFILE_SOURCE_DIR "/schema/demo-model.json";
-    if (std::system(
-            ("runuser -u nobody -- test -r '" + model + "' -a -x '" + sensorctl + "'").c_str()) !=
-        0)
-        GTEST_SKIP() << "nobody else can read the build";
+        return cannotRun("only root can renounce root");
+    const std::string model = smallModel();
+    ::chmod(folder_.path().c_str(), 0711);
+    ::chmod(model.c_str(), 0444);
     // A leak is looked for by a process that must not look any more.
     ServerProcess server(
         {"--model", model, "--user", "nobody", "--passwords", secret("passwords", userLine)},
@@ -197,7 +196,7 @@ TEST_F(ServeProcessTest, RootIsRenounced)
     EXPECT_EQ(ask(HttpClient(server.port()), request(asAnn)).status, 200);
     server.signal(SIGHUP);
     EXPECT_TRUE(server.waitForLog("Permission denied; what was read before stays in force"));
-    EXPECT_EQ(ask(HttpClient(server.port()), request(asAnn)).status, 200);
+    EXPECT_EQ(sensorsIn(ask(HttpClient(server.port()), request(asAnn)).body), 5U);
     EXPECT_EQ(server.end(SIGTERM).code, 0);
 }
 
@@ -205,7 +204,7 @@ TEST_F(ServeProcessTest, RootIsRenounced)
 TEST_F(ServeProcessTest, RootIsRenouncedWhereOnlyRootCanReadTheTool)
 {
     if (::geteuid() != 0)
-        GTEST_SKIP() << "only root can renounce root";
+        return cannotRun("only root can renounce root");
     const std::string tool = install(); // in a folder of root's
     std::filesystem::copy(SENSOR_PROFILE_BINARY_DIR "/lib", folder_.path() / "lib");
     const std::string readable = smallModel();
@@ -224,7 +223,7 @@ TEST_F(ServeProcessTest, RootIsRenouncedWhereOnlyRootCanReadTheTool)
 TEST_F(ServeProcessTest, ModelThatTheUserCannotReadIsTold)
 {
     if (::geteuid() != 0)
-        GTEST_SKIP() << "only root can renounce root";
+        return cannotRun("only root can renounce root");
     const std::string file = smallModel();
     for (const std::vector<std::string>& option :
         {std::vector<std::string>{"--model", file}, std::vector<std::string>{}}) {

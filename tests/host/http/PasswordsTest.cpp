@@ -5,6 +5,7 @@
 #include "host/http/Passwords.h"
 #include "host/http/PasswordHash.h"
 #include "tests/host/http/Hashes.h"
+#include "tests/support/Requirement.h"
 #include "tests/support/TemporaryFolder.h"
 
 #include <gmock/gmock.h>
@@ -126,7 +127,7 @@ TEST_F(PasswordFileTest, OthersMustNotReachIt)
 TEST_F(PasswordFileTest, OthersMustNotOwnIt)
 {
     if (::geteuid() != 0)
-        GTEST_SKIP() << "only root can give files away";
+        return Testing::cannotRun("only root can give files away");
     const std::string file = write(0600);
     constexpr ::uid_t somebody = 65534;
     ASSERT_EQ(::chown(file.c_str(), somebody, 0), 0);
