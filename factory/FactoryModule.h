@@ -4,7 +4,7 @@
 
 #pragma once
 
-#include "include/TracedOperation.h"
+#include "diagnostics/TracedOperation.h"
 
 #include <string>
 

@@ -2,8 +2,8 @@
 
 #include "model/SensorHarvest.h"
 
-#include "include/ProviderException.h"
-#include "include/TracedOperation.h"
+#include "diagnostics/ProviderException.h"
+#include "diagnostics/TracedOperation.h"
 #include "platform/instrumentation/Instrumentation.h"
 #include "platform/logging/PipeSignal.h"
 

@@ -5,8 +5,8 @@
 
 #pragma once
 
+#include "diagnostics/TracedOperation.h"
 #include "factory/SensorFactory.h"
-#include "include/TracedOperation.h"
 
 #include <cmpidt.h>
 

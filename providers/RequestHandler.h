@@ -5,7 +5,7 @@
 
 #pragma once
 
-#include "include/TracedOperation.h"
+#include "diagnostics/TracedOperation.h"
 
 #include <cmpidt.h>
 

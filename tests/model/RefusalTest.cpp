@@ -3,7 +3,7 @@
 // What the harvest does when a record refuses a value, whichever value that is, and the order
 // in which it hands values over.
 
-#include "include/ProviderException.h"
+#include "diagnostics/ProviderException.h"
 #include "model/SensorHarvest.h"
 #include "platform/instrumentation/Instrumentation.h"
 #include "tests/model/RefusingSensor.h"

@@ -2,7 +2,7 @@
 
 #include "model/SensorHarvest.h"
 
-#include "include/ProviderException.h"
+#include "diagnostics/ProviderException.h"
 #include "platform/instrumentation/Instrumentation.h"
 #include "tests/support/LogCapture.h"
 #include "tests/support/ScriptedMachine.h"

@@ -4,7 +4,7 @@
 
 #pragma once
 
-#include "include/Trace.h"
+#include "diagnostics/Trace.h"
 
 #include <string>
 #include <utility>

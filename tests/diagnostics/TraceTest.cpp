@@ -1,8 +1,8 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-#include "include/Trace.h"
+#include "diagnostics/Trace.h"
 
-#include "include/TracedOperation.h"
+#include "diagnostics/TracedOperation.h"
 #include "tests/support/LogCapture.h"
 
 #include <gtest/gtest.h>

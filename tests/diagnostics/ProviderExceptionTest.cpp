@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-#include "include/ProviderException.h"
+#include "diagnostics/ProviderException.h"
 
 #include <gtest/gtest.h>
 
