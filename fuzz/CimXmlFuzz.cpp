@@ -61,8 +61,6 @@ void requireWellFormedAnswer(std::string_view request, const Operation& operatio
         [&answer](std::string_view piece) { answer += piece; });
     if (operation.path != nullptr)
         writer.path(*operation.path);
-    if (operation.instance != nullptr)
-        writer.instance(*operation.instance);
     writer.finish();
     try {
         const Message none(answer);

@@ -48,17 +48,6 @@ std::string tail(bool isIntrinsic)
     return "</" + std::string(responseName(isIntrinsic)) + "></SIMPLERSP></MESSAGE></CIM>\n";
 }
 
-bool returnsNothing(OperationKind kind)
-{
-    return kind == OperationKind::modifyInstance || kind == OperationKind::deleteInstance ||
-           kind == OperationKind::setProperty || kind == OperationKind::closeEnumeration;
-}
-
-std::string_view returnElement(OperationKind kind)
-{
-    return kind == OperationKind::invokeMethod ? "RETURNVALUE" : "IRETURNVALUE";
-}
-
 bool isBetweenObjects(OperationKind kind)
 {
     return kind == OperationKind::associators || kind == OperationKind::associatorNames ||
@@ -75,7 +64,6 @@ std::string_view wrapperOf(OperationKind kind)
         return "VALUE.NAMEDINSTANCE";
     case OperationKind::associators:
     case OperationKind::references:
-    case OperationKind::execQuery:
         return "VALUE.OBJECTWITHPATH";
     default:
         return "VALUE.INSTANCEWITHPATH";
@@ -128,7 +116,7 @@ void AnswerWriter::instance(const Instance& instance)
 void AnswerWriter::path(const ObjectPath& path)
 {
     begin();
-    if (kind_ == OperationKind::enumerateInstanceNames || kind_ == OperationKind::createInstance)
+    if (kind_ == OperationKind::enumerateInstanceNames)
         writeInstanceName(piece_, path);
     else if (isBetweenObjects(kind_))
         writeObjectPath(piece_, path, location_);
@@ -179,9 +167,9 @@ void AnswerWriter::value(const Value& value)
 void AnswerWriter::finish()
 {
     begin();
-    if (!returnsNothing(kind_))
-        piece_.append("</").append(returnElement(kind_)).append(">");
-    piece_ += tail(kind_ != OperationKind::invokeMethod);
+    if (kind_ != OperationKind::closeEnumeration) // which returns nothing
+        piece_ += "</IRETURNVALUE>";
+    piece_ += tail(true);
     send();
 }
 
@@ -205,9 +193,9 @@ void AnswerWriter::begin()
     piece_.clear(); // of an object that could not be written
     if (hasBegun_)
         return;
-    piece_ = head(id_, protocolVersion_, kind_ != OperationKind::invokeMethod, methodName_);
-    if (!returnsNothing(kind_))
-        piece_.append("<").append(returnElement(kind_)).append(">");
+    piece_ = head(id_, protocolVersion_, true, methodName_);
+    if (kind_ != OperationKind::closeEnumeration)
+        piece_ += "<IRETURNVALUE>";
 }
 
 void AnswerWriter::send()

@@ -43,7 +43,7 @@ public:
     // Of EnumerateClassNames, and of associations between classes.
     void className(std::string_view name);
     void qualifierDeclaration(const QualifierDeclaration& declared);
-    // Of a property, or of a method.
+    // Of a property.
     void value(const Value& value);
 
     bool hasBegun() const noexcept { return hasBegun_; }

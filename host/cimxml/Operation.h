@@ -4,7 +4,6 @@
 
 #pragma once
 
-#include "host/broker/Value.h"
 #include "host/cimxml/PropertySelection.h"
 
 #include <cstdint>
@@ -14,7 +13,6 @@
 #include <vector>
 
 namespace Host {
-class Instance;
 class ObjectPath;
 class Repository;
 } // namespace Host
@@ -27,12 +25,7 @@ enum class OperationKind {
     getInstance,
     enumerateInstances,
     enumerateInstanceNames,
-    createInstance,
-    modifyInstance,
-    deleteInstance,
     getProperty,
-    setProperty,
-    execQuery,
     associators,
     associatorNames,
     references,
@@ -51,7 +44,6 @@ enum class OperationKind {
     pullInstancesWithPath,
     pullInstancePaths,
     closeEnumeration,
-    invokeMethod, // of a class; its arguments are not read
 };
 
 // What an operation does not take, and what the client did not give, is as here; flags have the
@@ -61,9 +53,8 @@ struct Operation {
     OperationKind kind = OperationKind::getInstance;
     std::string nameSpace;
 
-    std::string className;              // the path's, where there is one; empty for all classes
-    const ObjectPath* path = nullptr;   // of the instance, or of an association's source
-    const Instance* instance = nullptr; // the new or modified one
+    std::string className;            // the path's, where there is one; empty for all classes
+    const ObjectPath* path = nullptr; // of the instance, or of an association's source
 
     bool deepInheritance = false;
     PropertySelection selection; // with LocalOnly and the like, and the property list
@@ -76,22 +67,20 @@ struct Operation {
 
     std::string propertyName;
     std::string qualifierName;
-    Value newValue;
-    std::string methodName;
 
-    std::string queryLanguage; // of ExecQuery, or of the filter of an enumeration
-    std::string query;
+    std::string filterQueryLanguage;
+    std::string filterQuery;
     std::optional<std::uint32_t> operationTimeout; // in seconds
     bool continueOnError = false;
     std::uint32_t maxObjectCount = 0;
     std::string enumerationContext;
 };
 
-// Reads the call. Paths, instances and values live in the arena of this thread's request, which
-// must be there. Throws RequestError for elements that lack something, and Refusal:
+// Reads the call. Paths live in the arena of this thread's request, which must be there. Throws
+// RequestError for elements that lack something, and Refusal:
 //
 //   CMPI_RC_ERR_INVALID_NAMESPACE   there is no such namespace
-//   CMPI_RC_ERR_NOT_SUPPORTED       an operation that is not offered
+//   CMPI_RC_ERR_NOT_SUPPORTED       an operation that is not offered, or a method of a class
 //   CMPI_RC_ERR_INVALID_PARAMETER   a parameter that is missing, unknown, given twice or of
 //                                   another kind, or a value that does not fit; it is named
 //   CMPI_RC_ERR_INVALID_CLASS       a key without name, of a class that is not known

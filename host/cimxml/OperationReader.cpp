@@ -3,12 +3,12 @@
 #include "host/broker/Names.h"
 #include "host/broker/ObjectPath.h"
 #include "host/broker/Refusal.h"
-#include "host/cimxml/InstanceReader.h"
 #include "host/cimxml/InvalidParameter.h"
 #include "host/cimxml/Literal.h"
 #include "host/cimxml/Message.h"
 #include "host/cimxml/MessageParts.h"
 #include "host/cimxml/OperationTable.h"
+#include "host/cimxml/PathReader.h"
 #include "host/repository/MofError.h"
 #include "host/repository/Words.h"
 
@@ -127,8 +127,7 @@ private:
 class OperationReader {
 public:
     OperationReader(const Repository& classes, const Parameters& parameters, Operation& operation)
-        : classes_(classes), parameters_(parameters), paths_(classes), instances_(classes),
-          operation_(operation)
+        : parameters_(parameters), paths_(classes), operation_(operation)
     {
     }
 
@@ -138,9 +137,6 @@ public:
         readTexts();
         readClasses();
         readPath();
-        readInstances();
-        if (operation_.kind == OperationKind::setProperty)
-            readNewValue();
     }
 
 private:
@@ -162,10 +158,8 @@ private:
         operation_.resultRole = parameters_.text(P::resultRole);
         operation_.propertyName = parameters_.text(P::propertyName);
         operation_.qualifierName = parameters_.text(P::qualifierName);
-        const bool isFilter = !parameters_[P::query];
-        operation_.query = parameters_.text(isFilter ? P::filterQuery : P::query);
-        operation_.queryLanguage =
-            parameters_.text(isFilter ? P::filterQueryLanguage : P::queryLanguage);
+        operation_.filterQuery = parameters_.text(P::filterQuery);
+        operation_.filterQueryLanguage = parameters_.text(P::filterQueryLanguage);
         operation_.enumerationContext = parameters_.text(P::enumerationContext);
     }
 
@@ -190,77 +184,36 @@ private:
             return;
         }
         const auto name = parameters_.get(object ? P::objectName : P::instanceName, "INSTANCENAME");
-        if (name)
-            setPath(*name);
-    }
-
-    void setPath(const Element& instanceName)
-    {
-        operation_.path = &paths_.instanceName(instanceName, operation_.nameSpace);
+        if (!name)
+            return;
+        operation_.path = &paths_.instanceName(*name, operation_.nameSpace);
         operation_.className = operation_.path->className();
     }
 
-    void readInstances()
-    {
-        if (const auto created = parameters_.get(P::newInstance, "INSTANCE")) {
-            operation_.instance = &instances_.instance(*created, operation_.nameSpace);
-            operation_.className = operation_.instance->className();
-        }
-        const auto modified = parameters_.get(P::modifiedInstance, "VALUE.NAMEDINSTANCE");
-        if (!modified)
-            return;
-        const std::vector<Element> parts = modified->children({"INSTANCENAME", "INSTANCE"});
-        if (parts.size() != 2 || !parts[0].is("INSTANCENAME") || !parts[1].is("INSTANCE"))
-            modified->fail("it must hold an INSTANCENAME and an INSTANCE");
-        setPath(parts[0]);
-        if (!equalNames(operation_.className, parts[1].attribute("CLASSNAME")))
-            refuse(described(P::modifiedInstance) + " is of another class than its path");
-        operation_.instance = &instances_.instance(parts[1], operation_.nameSpace, operation_.path);
-    }
-
-    void readNewValue()
-    {
-        const ClassDeclaration* const declared =
-            classes_.findClass(operation_.nameSpace, operation_.className);
-        const PropertyDeclaration* const property =
-            declared == nullptr ? nullptr : declared->property(operation_.propertyName);
-        // A class or property that is not known is found out before the value matters.
-        if (property != nullptr)
-            operation_.newValue = instances_.value(parameters_[P::newValue], property->type,
-                described(P::newValue), operation_.nameSpace);
-    }
-
-    const Repository& classes_;
     const Parameters& parameters_;
     PathReader paths_;
-    InstanceReader instances_;
     Operation& operation_;
 };
 
-// Nothing is known of the arguments' types, so only the target is read.
-void readMethodCall(const Element& call, const Repository& classes, Operation& operation)
+// No class has a method that can be called: neither the path's keys nor the arguments are read.
+[[noreturn]] void refuseMethod(const Message& message, const PathReader& paths)
 {
-    const PathReader paths(classes);
-    const auto target = pathOf(call).children({"LOCALNAMESPACEPATH", "INSTANCENAME", "CLASSNAME"});
-    for (const Element& part : target) {
-        if (part.is("CLASSNAME")) {
-            operation.className = paths.className(part, operation.nameSpace);
-        } else if (part.is("INSTANCENAME")) {
-            operation.path = &paths.instanceName(part, operation.nameSpace);
-            operation.className = operation.path->className();
-        }
-    }
-    if (operation.className.empty())
-        pathOf(call).fail("it names no class");
+    const Element path = pathOf(callOf(message.document()));
+    std::string className;
+    for (const Element& part : path.children({"LOCALNAMESPACEPATH", "INSTANCENAME", "CLASSNAME"}))
+        if (!part.is("LOCALNAMESPACEPATH"))
+            className = paths.className(part, message.nameSpace());
+    if (className.empty())
+        path.fail("it names no class");
+    throw Refusal(CMPI_RC_ERR_NOT_SUPPORTED,
+        "class " + className + " offers no method " + message.methodName());
 }
 
 } // namespace
 
 Operation readOperation(const Message& message, const Repository& classes)
 {
-    const Element call = callOf(message.document());
-    const OperationForm* const form =
-        message.isIntrinsic() ? findOperation(message.methodName()) : nullptr;
+    const OperationForm* const form = findOperation(message.methodName());
     if (message.isIntrinsic() && form == nullptr)
         throw Refusal(CMPI_RC_ERR_NOT_SUPPORTED,
             "operation " + quotation(message.methodName()) + " is not offered");
@@ -268,16 +221,12 @@ Operation readOperation(const Message& message, const Repository& classes)
     if (nameSpace == nullptr)
         throw Refusal(CMPI_RC_ERR_INVALID_NAMESPACE,
             "there is no namespace " + quotation(message.nameSpace()));
+    if (!message.isIntrinsic())
+        refuseMethod(message, PathReader(classes));
     Operation operation;
-    operation.nameSpace = nameSpace->name();
-    if (form == nullptr) {
-        operation.kind = OperationKind::invokeMethod;
-        operation.methodName = message.methodName();
-        readMethodCall(call, classes, operation);
-        return operation;
-    }
     operation.kind = form->kind;
-    OperationReader(classes, Parameters(*form, call), operation).read();
+    operation.nameSpace = nameSpace->name();
+    OperationReader(classes, Parameters(*form, callOf(message.document())), operation).read();
     return operation;
 }
 

@@ -22,18 +22,12 @@ constexpr Set opening(P::filterQuery, P::filterQueryLanguage, P::operationTimeou
     P::continueOnError, P::maxObjectCount);
 constexpr Set openingInstances = opening | Set(P::includeClassOrigin, P::propertyList);
 
-constexpr std::array<OperationForm, 27> forms = {{
+constexpr std::array<OperationForm, 22> forms = {{
     {Kind::getInstance, "GetInstance", {P::instanceName}, look | P::localOnly, {P::localOnly}},
     {Kind::enumerateInstances, "EnumerateInstances", {P::className},
         look | Set(P::localOnly, P::deepInheritance), {P::localOnly, P::deepInheritance}},
     {Kind::enumerateInstanceNames, "EnumerateInstanceNames", {P::className}, nothing, nothing},
-    {Kind::createInstance, "CreateInstance", {P::newInstance}, nothing, nothing},
-    {Kind::modifyInstance, "ModifyInstance", {P::modifiedInstance},
-        {P::includeQualifiers, P::propertyList}, {P::includeQualifiers}},
-    {Kind::deleteInstance, "DeleteInstance", {P::instanceName}, nothing, nothing},
     {Kind::getProperty, "GetProperty", {P::instanceName, P::propertyName}, nothing, nothing},
-    {Kind::setProperty, "SetProperty", {P::instanceName, P::propertyName}, {P::newValue}, nothing},
-    {Kind::execQuery, "ExecQuery", {P::queryLanguage, P::query}, nothing, nothing},
     {Kind::associators, "Associators", {P::objectName}, association | look, nothing},
     {Kind::associatorNames, "AssociatorNames", {P::objectName}, association, nothing},
     {Kind::references, "References", {P::objectName}, reference | look, nothing},
@@ -71,9 +65,8 @@ constexpr std::array<OperationForm, 27> forms = {{
 constexpr std::array<std::string_view, parameterCount> parameterNames = {"AssocClass", "ClassName",
     "ContinueOnError", "DeepInheritance", "EnumerationContext", "FilterQuery",
     "FilterQueryLanguage", "IncludeClassOrigin", "IncludeQualifiers", "InstanceName", "LocalOnly",
-    "MaxObjectCount", "ModifiedInstance", "NewInstance", "NewValue", "ObjectName",
-    "OperationTimeout", "PropertyList", "PropertyName", "QualifierName", "Query", "QueryLanguage",
-    "ResultClass", "ResultRole", "Role"};
+    "MaxObjectCount", "ObjectName", "OperationTimeout", "PropertyList", "PropertyName",
+    "QualifierName", "ResultClass", "ResultRole", "Role"};
 
 } // namespace
 

@@ -26,21 +26,16 @@ enum class Parameter : std::uint8_t {
     instanceName,
     localOnly,
     maxObjectCount,
-    modifiedInstance,
-    newInstance,
-    newValue,
     objectName,
     operationTimeout,
     propertyList,
     propertyName,
     qualifierName,
-    query,
-    queryLanguage,
     resultClass,
     resultRole,
     role,
 };
-inline constexpr std::size_t parameterCount = 25;
+inline constexpr std::size_t parameterCount = 20;
 
 class ParameterSet {
 public:

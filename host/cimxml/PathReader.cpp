@@ -53,14 +53,10 @@ const ObjectPath& PathReader::instanceName(const Element& element, std::string_v
     return instance(element, nameSpace, 1);
 }
 
-const ObjectPath& PathReader::reference(const Element& element, std::string_view nameSpace) const
-{
-    return target(element, nameSpace, 1);
-}
-
 std::string PathReader::className(const Element& element, std::string_view nameSpace) const
 {
-    const std::string_view name = element.attribute("NAME");
+    const std::string_view name =
+        element.attribute(element.is("INSTANCENAME") ? "CLASSNAME" : "NAME");
     const ClassDeclaration* const declared = classes_.findClass(nameSpace, name);
     return declared == nullptr ? std::string(name) : declared->name;
 }

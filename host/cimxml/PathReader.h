@@ -27,9 +27,7 @@ public:
 
     // An INSTANCENAME of the namespace.
     const ObjectPath& instanceName(const Element& element, std::string_view nameSpace) const;
-    // A VALUE.REFERENCE. What it holds is of the namespace unless it names another.
-    const ObjectPath& reference(const Element& element, std::string_view nameSpace) const;
-    // The class of a CLASSNAME, as it is declared.
+    // The class that a CLASSNAME or an INSTANCENAME names, as it is declared.
     std::string className(const Element& element, std::string_view nameSpace) const;
 
 private:

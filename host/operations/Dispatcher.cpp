@@ -101,16 +101,6 @@ void Dispatcher::runToTheEnd(const Operation& operation, Request& request, Answe
         return instances_.enumerateNames(operation, request, found);
     case Kind::getProperty:
         return instances_.getProperty(operation, request, found);
-    case Kind::setProperty:
-        return instances_.setProperty(operation, request);
-    case Kind::createInstance:
-        return instances_.create(operation, request, found);
-    case Kind::modifyInstance:
-        return instances_.modify(operation, request);
-    case Kind::deleteInstance:
-        return instances_.remove(operation, request);
-    case Kind::execQuery:
-        return instances_.query(operation, request, found);
     case Kind::associators:
     case Kind::openAssociatorInstances:
         return associations_.associators(operation, request, found);
@@ -133,9 +123,6 @@ void Dispatcher::runToTheEnd(const Operation& operation, Request& request, Answe
         return getQualifier(classes_, operation, found);
     case Kind::enumerateQualifiers:
         return enumerateQualifiers(classes_, operation, found);
-    case Kind::invokeMethod:
-        throw Refusal(CMPI_RC_ERR_NOT_SUPPORTED,
-            "class " + operation.className + " offers no method " + operation.methodName);
     case Kind::pullInstancesWithPath:
     case Kind::pullInstancePaths:
     case Kind::closeEnumeration:

@@ -3,7 +3,6 @@
 #include "host/operations/InstanceOperations.h"
 
 #include "host/broker/Instance.h"
-#include "host/broker/Names.h"
 #include "host/broker/ObjectPath.h"
 #include "host/broker/Refusal.h"
 #include "host/broker/Request.h"
@@ -13,26 +12,9 @@
 #include "host/operations/WholeResult.h"
 #include "host/repository/Repository.h"
 
-#include <sstream>
-
 namespace Host {
 
 using CimXml::Operation;
-
-namespace {
-
-// What stands behind FROM; empty when nothing does. Providers read the rest.
-std::string classOfQuery(const std::string& query)
-{
-    std::istringstream words(query);
-    std::string word;
-    while (words >> word)
-        if (equalNames(word, "FROM") && words >> word)
-            return word;
-    return {};
-}
-
-} // namespace
 
 void InstanceOperations::get(
     const Operation& operation, Request& request, AnswerObjects& found) const
@@ -69,46 +51,6 @@ void InstanceOperations::getProperty(
         manager_.getInstance(request.context(), *operation.path, properties.get());
     const Value* const value = instance.property(name);
     found.add(value == nullptr ? Value() : *value);
-}
-
-void InstanceOperations::setProperty(const Operation& operation, Request& request) const
-{
-    const std::string& name = propertyOf(operation);
-    Instance& changed = request.makeInstance(*operation.path);
-    changed.setProperty(name, operation.newValue);
-    PropertyNames properties(name);
-    manager_.modifyInstance(request.context(), *operation.path, changed, properties.get());
-}
-
-void InstanceOperations::create(
-    const Operation& operation, Request& request, AnswerObjects& found) const
-{
-    found.add(&manager_.createInstance(
-        request.context(), operation.instance->objectPath(), *operation.instance));
-}
-
-void InstanceOperations::modify(const Operation& operation, Request& request) const
-{
-    PropertyNames properties(operation.selection.properties);
-    manager_.modifyInstance(
-        request.context(), *operation.path, *operation.instance, properties.get());
-}
-
-void InstanceOperations::remove(const Operation& operation, Request& request) const
-{
-    manager_.deleteInstance(request.context(), *operation.path);
-}
-
-void InstanceOperations::query(
-    const Operation& operation, Request& request, AnswerObjects& found) const
-{
-    const std::string className = classOfQuery(operation.query);
-    if (className.empty())
-        throw Refusal(CMPI_RC_ERR_INVALID_QUERY, "the query names no class to select from");
-    addWhole(found, [&](ResultSink& sink) {
-        manager_.execQuery(request.context(), request.makePath(operation.nameSpace, className),
-            operation.query.c_str(), operation.queryLanguage.c_str(), sink);
-    });
 }
 
 const std::string& InstanceOperations::propertyOf(const Operation& operation) const

@@ -29,18 +29,9 @@ public:
     void enumerateNames(
         const CimXml::Operation& operation, Request& request, AnswerObjects& found) const;
 
-    // Throw Refusal (CMPI_RC_ERR_NO_SUCH_PROPERTY) for one that the class does not have.
+    // Throws Refusal (CMPI_RC_ERR_NO_SUCH_PROPERTY) for one that the class does not have.
     void getProperty(
         const CimXml::Operation& operation, Request& request, AnswerObjects& found) const;
-    void setProperty(const CimXml::Operation& operation, Request& request) const;
-
-    void create(const CimXml::Operation& operation, Request& request, AnswerObjects& found) const;
-    void modify(const CimXml::Operation& operation, Request& request) const;
-    void remove(const CimXml::Operation& operation, Request& request) const;
-
-    // Goes to the provider of the class that the query selects from. Throws Refusal
-    // (CMPI_RC_ERR_INVALID_QUERY) when it does not say of which.
-    void query(const CimXml::Operation& operation, Request& request, AnswerObjects& found) const;
 
 private:
     // The name as it is declared.

@@ -52,7 +52,7 @@ bool PullOperations::isOpening(OperationKind kind)
 
 void PullOperations::checkOpening(const Operation& operation) const
 {
-    if (!operation.query.empty() || !operation.queryLanguage.empty())
+    if (!operation.filterQuery.empty() || !operation.filterQueryLanguage.empty())
         throw Refusal(
             filteredEnumerationNotSupported, "enumerations cannot be filtered by a query");
     if (operation.continueOnError)

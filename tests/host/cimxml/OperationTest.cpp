@@ -136,8 +136,8 @@ TEST_F(OperationTest, readsWhatEnumerationsAreOpenedWith)
         Gauge + valueOf("FilterQuery", "q") + valueOf("FilterQueryLanguage", "DMTF:FQL") +
             valueOf("OperationTimeout", "30") + valueOf("ContinueOnError", "true") +
             valueOf("MaxObjectCount", "1000")));
-    EXPECT_EQ(operation.query, "q");
-    EXPECT_EQ(operation.queryLanguage, "DMTF:FQL");
+    EXPECT_EQ(operation.filterQuery, "q");
+    EXPECT_EQ(operation.filterQueryLanguage, "DMTF:FQL");
     EXPECT_EQ(operation.operationTimeout, 30U);
     EXPECT_TRUE(operation.continueOnError);
     EXPECT_EQ(operation.maxObjectCount, 1000U);
@@ -176,27 +176,25 @@ TEST_F(OperationTest, keepsTheSpellingOfAnUnknownClass)
     EXPECT_EQ(read(call("GetClass", classOf("ClassName", "Nothing"))).className, "Nothing");
 }
 
-TEST_F(OperationTest, recognisesMethodsOfClasses)
+TEST_F(OperationTest, RefusesMethodsOfClassesWithoutReadingTheirArguments)
 {
     const std::string where = "<LOCALNAMESPACEPATH><NAMESPACE NAME='root'/><NAMESPACE NAME='test'/>"
                               "</LOCALNAMESPACEPATH>";
     const auto method = [&](const std::string& path) {
         return withHead("<SIMPLEREQ><METHODCALL NAME='Reset'>" + path +
-                        "<PARAMVALUE NAME='Hard' PARAMTYPE='boolean'><VALUE>TRUE</VALUE>"
-                        "</PARAMVALUE></METHODCALL></SIMPLEREQ>");
+                        "<PARAMVALUE/></METHODCALL></SIMPLEREQ>");
     };
-    const auto onInstance =
-        read(method("<LOCALINSTANCEPATH>" + where + thing() + "</LOCALINSTANCEPATH>"));
-    EXPECT_EQ(onInstance.kind, OperationKind::invokeMethod);
-    EXPECT_EQ(onInstance.methodName, "Reset");
-    EXPECT_EQ(onInstance.path->toText(), "root/test:Thing.Name=\"a\",Index=7");
-    const auto onClass = read(method("<LOCALCLASSPATH>" + where +
-                                     "<CLASSNAME NAME='thing'/>"
-                                     "</LOCALCLASSPATH>"));
-    EXPECT_EQ(onClass.className, "Thing");
+    const auto onClass = [&](const std::string& name) {
+        return method("<LOCALCLASSPATH>" + where + name + "</LOCALCLASSPATH>");
+    };
+    EXPECT_EQ(refusalOf(method("<LOCALINSTANCEPATH>" + where + thing() + "</LOCALINSTANCEPATH>")),
+        "7 class Thing offers no method Reset");
+    EXPECT_EQ(
+        refusalOf(onClass("<CLASSNAME NAME='thing'/>")), "7 class Thing offers no method Reset");
+    EXPECT_EQ(
+        refusalOf(onClass("<CLASSNAME NAME='Other'/>")), "7 class Other offers no method Reset");
     EXPECT_THAT(refusalOf(method("")), StartsWith("request-not-loosely-valid "));
-    EXPECT_THAT(refusalOf(method("<LOCALCLASSPATH>" + where + "</LOCALCLASSPATH>")),
-        StartsWith("request-not-loosely-valid "));
+    EXPECT_THAT(refusalOf(onClass("")), StartsWith("request-not-loosely-valid "));
 }
 
 } // namespace

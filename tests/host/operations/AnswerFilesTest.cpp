@@ -101,8 +101,7 @@ TEST(AnswerFiles, coverEveryOperationWithEachOfItsParameters)
         textsByOperation[between(text, "<IMETHODCALL NAME=\"", "\"")] += text;
     }
     for (const char* const operation :
-        {"GetInstance", "EnumerateInstances", "EnumerateInstanceNames", "CreateInstance",
-            "ModifyInstance", "DeleteInstance", "GetProperty", "SetProperty", "ExecQuery",
+        {"GetInstance", "EnumerateInstances", "EnumerateInstanceNames", "GetProperty",
             "Associators", "AssociatorNames", "References", "ReferenceNames", "GetClass",
             "EnumerateClasses", "EnumerateClassNames", "GetQualifier", "EnumerateQualifiers",
             "OpenEnumerateInstances", "OpenEnumerateInstancePaths", "OpenAssociatorInstances",

@@ -86,20 +86,17 @@ TEST_F(DispatcherFaultTest, aProviderThatThrowsIsAFailure)
     EXPECT_EQ(errorOf("EnumerateInstances", ofThing_), "1: Things: ouch");
 }
 
-TEST_F(DispatcherFaultTest, whatAProviderLeavesOutIsNotSupported)
+TEST_F(DispatcherFaultTest, NothingIsReadOfOperationsThatChangeSomethingOrQuery)
 {
-    EXPECT_EQ(errorOf("ExecQuery",
-                  valueOf("QueryLanguage", "WQL") + valueOf("Query", "SELECT * from\n Thing x")),
-        "7: Things does not support queries of Thing");
-}
-
-TEST_F(DispatcherFaultTest, aQueryOfAnUnknownClassIsOfAnInvalidOne)
-{
-    const std::string language = valueOf("QueryLanguage", "WQL");
-    EXPECT_EQ(errorOf("ExecQuery", language + valueOf("Query", "select * from Unheard")),
-        "5: there is no class Unheard in root/test");
-    EXPECT_EQ(errorOf("ExecQuery", language + valueOf("Query", "select * from")),
-        "15: the query names no class to select from");
+    manager_.script("Things", [](const ProviderCall&) {
+        ADD_FAILURE() << "was asked";
+        return Ok;
+    });
+    for (const std::string operation : {"CreateInstance", "ModifyInstance", "DeleteInstance",
+             "SetProperty", "CreateClass", "ModifyClass", "DeleteClass", "SetQualifier",
+             "DeleteQualifier", "ExecQuery", "OpenQueryInstances"})
+        EXPECT_EQ(errorOf(operation, parameter("InstanceName", thing()) + "<IPARAMVALUE/>"),
+            "7: operation &quot;" + operation + "&quot; is not offered");
 }
 
 TEST_F(DispatcherFaultTest, aMethodOfAClassIsNotSupported)

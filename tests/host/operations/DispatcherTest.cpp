@@ -171,54 +171,6 @@ TEST_F(DispatcherTest, theFiltersOfAssociationsArrive)
     EXPECT_EQ(calls_, 8);
 }
 
-TEST_F(DispatcherTest, whatWasMadeIsAnsweredByItsPath)
-{
-    manager_.script("Things", [this](const ProviderCall& asked) {
-        EXPECT_EQ(asked.operation, "createInstance");
-        EXPECT_EQ(Host::ObjectPath::of(asked.path)->key("Name")->text(), "new");
-        // A path is what a provider answers here.
-        return manager_.deliver({.operation = "Name", .result = asked.result}, "Thing", "new");
-    });
-    EXPECT_THAT(ask("CreateInstance",
-                    parameter("NewInstance", "<INSTANCE CLASSNAME=\"Thing\"><PROPERTY "
-                                             "NAME=\"Name\" TYPE=\"string\"><VALUE>new</VALUE>"
-                                             "</PROPERTY></INSTANCE>")),
-        HasSubstr("<IRETURNVALUE><INSTANCENAME CLASSNAME=\"Thing\">"));
-}
-
-TEST_F(DispatcherTest, successWithoutObjectsIsAnEmptyAnswer)
-{
-    std::vector<std::string> seen;
-    manager_.script("Things", [&seen](const ProviderCall& asked) {
-        seen.push_back(asked.operation);
-        return Ok;
-    });
-    const std::string name = parameter("InstanceName", thing());
-    EXPECT_THAT(ask("DeleteInstance", name),
-        HasSubstr("<IMETHODRESPONSE NAME=\"DeleteInstance\"></IMETHODRESPONSE>"));
-    EXPECT_THAT(ask("ModifyInstance",
-                    parameter("ModifiedInstance", "<VALUE.NAMEDINSTANCE>" + thing() +
-                                                      "<INSTANCE CLASSNAME=\"Thing\"></INSTANCE>"
-                                                      "</VALUE.NAMEDINSTANCE>")),
-        HasSubstr("<IMETHODRESPONSE NAME=\"ModifyInstance\"></IMETHODRESPONSE>"));
-    EXPECT_THAT(ask("EnumerateInstances", ofThing_), HasSubstr("<IRETURNVALUE></IRETURNVALUE>"));
-    EXPECT_THAT(seen, ElementsAre("deleteInstance", "modifyInstance", "enumerateInstances"));
-}
-
-TEST_F(DispatcherTest, settingAPropertyModifiesThatOneAlone)
-{
-    manager_.script("Things", [this](const ProviderCall& asked) {
-        EXPECT_EQ(asked.operation, "modifyInstance");
-        EXPECT_THAT(listed(asked.properties), ElementsAre("Label"));
-        ++calls_;
-        return Ok;
-    });
-    EXPECT_THAT(ask("SetProperty", parameter("InstanceName", thing()) +
-                                       valueOf("PropertyName", "label") + valueOf("NewValue", "b")),
-        HasSubstr("<IMETHODRESPONSE NAME=\"SetProperty\"></IMETHODRESPONSE>"));
-    EXPECT_EQ(calls_, 1);
-}
-
 TEST_F(DispatcherTest, aPathWithoutHostGetsTheManagersAndItsNamespace)
 {
     manager_.deliverThings(1);
