@@ -5,7 +5,8 @@
 #include "platform/instrumentation/FailureLog.h"
 #include "platform/instrumentation/Source.h"
 #include "platform/instrumentation/SourceRegistry.h"
-#include "platform/instrumentation/Utf8.h"
+#include "platform/text/Escape.h"
+#include "platform/text/Utf8.h"
 
 #include <cstdlib>
 #include <exception>
@@ -179,7 +180,7 @@ std::string Instrumentation::getPathToNode() const
 
 std::string Instrumentation::convertPathToString(const std::string& path) const
 {
-    return escapeControls(toValidUtf8(path));
+    return Text::escapeControls(Text::toValidUtf8(path));
 }
 
 std::string Instrumentation::getNodeDescription() const

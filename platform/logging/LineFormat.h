@@ -16,12 +16,9 @@ struct Origin {
     unsigned line;
 };
 
-// "<channel> <level> <component> <function>(<file>:<line>) <text>", escaped.
+// Returns "<channel> <level> <component> <function>(<file>:<line>) <text>". In each text a newline
+// is written as \n, another control character as \xNN and a backslash as \\.
 std::string formatLine(std::string_view channel, int level, const Origin& origin,
     std::string_view component, std::string_view text);
-
-// Appends the text with newlines as \n, other control characters as \xNN and backslashes as \\.
-// Bytes from 0x80 up are taken as UTF-8 text and stay.
-void appendEscaped(std::string& line, std::string_view text);
 
 } // namespace RynLog

@@ -95,7 +95,7 @@ std::shared_ptr<spdlog::sinks::sink> openFile(const std::string& path)
     const int descriptor = ::open(path.c_str(), flags, ownerWritesGroupReads);
     const int error = errno;
     std::string name = "the log file ";
-    appendEscaped(name, path);
+    Text::appendEscaped(name, path, Text::Backslash::doubled);
     if (descriptor < 0)
         throw failure("open", name, error);
     return std::make_shared<FileSink>(descriptor, std::move(name));

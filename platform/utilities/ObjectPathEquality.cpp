@@ -1,5 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
+#include "platform/text/Trim.h"
 #include "platform/utilities/KeyValue.h"
 #include "platform/utilities/ProviderUtilities.h"
 
@@ -37,12 +38,7 @@ std::string_view namespaceOf(const CMPIObjectPath* path)
 {
     CMPIStatus status{};
     CMPIString* const name = path->ft->getNameSpace(path, &status);
-    std::string_view text = status.rc == CMPI_RC_OK ? textOf(name) : std::string_view();
-    while (text.starts_with('/'))
-        text.remove_prefix(1);
-    while (text.ends_with('/'))
-        text.remove_suffix(1);
-    return text;
+    return status.rc == CMPI_RC_OK ? Text::trimmed(textOf(name), "/") : std::string_view();
 }
 
 bool sameNamespace(const CMPIObjectPath* a, const CMPIObjectPath* b)

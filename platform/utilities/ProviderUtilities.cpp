@@ -2,6 +2,8 @@
 
 #include "platform/utilities/ProviderUtilities.h"
 
+#include "platform/text/Trim.h"
+
 #include <algorithm>
 
 #include <sys/utsname.h>
@@ -26,11 +28,7 @@ std::string getSystemName()
 
 std::string stripSpaces(const std::string& text)
 {
-    constexpr const char* blanks = " \t";
-    const auto first = text.find_first_not_of(blanks);
-    if (first == std::string::npos)
-        return {};
-    return text.substr(first, text.find_last_not_of(blanks) - first + 1);
+    return std::string(Text::trimmed(text, " \t"));
 }
 
 bool isSameName(std::string_view a, std::string_view b)

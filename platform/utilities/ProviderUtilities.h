@@ -17,9 +17,8 @@ std::string getSystemName();
 // Without leading and trailing blanks, which are spaces and tabs.
 std::string stripSpaces(const std::string& text);
 
-// UTF-8 from wide characters and back. What has no valid form becomes U+FFFD, once for each
-// wide character and once for each broken sequence of bytes (the longest prefix of a valid one);
-// never throws but for lack of memory.
+// UTF-8 from wide characters and back. Each wide character that is no code point and each byte
+// that belongs to no character becomes U+FFFD. Throws only for lack of memory.
 std::string make_string(const std::wstring& text);
 std::wstring make_wstring(const std::string& text);
 

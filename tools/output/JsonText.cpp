@@ -2,6 +2,7 @@
 
 #include "tools/output/JsonText.h"
 
+#include "platform/text/Utf8.h"
 #include "tools/output/Utf8.h"
 
 #include <array>
@@ -15,15 +16,16 @@ std::string escapeUnprintable(std::string_view json)
     std::string result;
     result.reserve(json.size());
     while (!json.empty()) {
-        const std::string_view before = json;
-        const char32_t character = takeCharacter(json);
-        if (character <= lastOfAscii || !isUnprintable(character)) {
-            result += before.substr(0, before.size() - json.size());
-            continue;
+        const Text::Character character = Text::firstCharacter(json);
+        if (character.code <= lastOfAscii || !isUnprintable(character.code)) {
+            result += json.substr(0, character.size);
+        } else {
+            std::array<char, 16> escape{};
+            std::snprintf(
+                escape.data(), escape.size(), "\\u%04x", static_cast<unsigned>(character.code));
+            result += escape.data();
         }
-        std::array<char, 16> escape{};
-        std::snprintf(escape.data(), escape.size(), "\\u%04x", static_cast<unsigned>(character));
-        result += escape.data();
+        json.remove_prefix(character.size);
     }
     return result;
 }

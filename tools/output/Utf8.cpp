@@ -2,6 +2,8 @@
 
 #include "tools/output/Utf8.h"
 
+#include "platform/text/Utf8.h"
+
 #include <array>
 #include <cstdio>
 
@@ -9,32 +11,7 @@ namespace Tools {
 
 namespace {
 
-constexpr char32_t replacement = 0xFFFD;
-constexpr std::string_view replacementBytes = "\xEF\xBF\xBD";
 constexpr std::string_view ellipsis = "\xE2\x80\xA6"; // one column wide
-
-// Bytes of the character that begins with this one; 0 for a byte that begins none.
-constexpr std::size_t lengthFrom(unsigned char first)
-{
-    if (first < 0x80)
-        return 1;
-    if (first >= 0xC2 && first < 0xE0)
-        return 2;
-    if (first >= 0xE0 && first < 0xF0)
-        return 3;
-    if (first >= 0xF0 && first < 0xF5)
-        return 4;
-    return 0;
-}
-
-constexpr std::array<char32_t, 5> smallestOfLength = {0, 0, 0x80, 0x800, 0x10000};
-constexpr std::array<unsigned, 5> firstByteMask = {0, 0x7F, 0x1F, 0x0F, 0x07};
-
-constexpr bool isCharacter(char32_t value, std::size_t length)
-{
-    const bool isSurrogate = value >= 0xD800 && value <= 0xDFFF;
-    return value >= smallestOfLength[length] && value <= 0x10FFFF && !isSurrogate;
-}
 
 // The escape of an unprintable character.
 std::string escapeOf(char32_t character)
@@ -57,22 +34,6 @@ std::string escapeOf(char32_t character)
 
 } // namespace
 
-char32_t takeCharacter(std::string_view& text)
-{
-    const auto byte = [&](std::size_t at) { return static_cast<unsigned char>(text[at]); };
-    const std::size_t length = lengthFrom(byte(0));
-    char32_t value = length == 0 ? replacement : byte(0) & firstByteMask[length];
-    std::size_t taken = 1;
-    for (; taken < length && taken < text.size() && (byte(taken) & 0xC0) == 0x80; ++taken)
-        value = value << 6 | (byte(taken) & 0x3F);
-    if (length == 0 || taken < length || !isCharacter(value, length)) {
-        text.remove_prefix(1);
-        return replacement;
-    }
-    text.remove_prefix(length);
-    return value;
-}
-
 bool isUnprintable(char32_t character)
 {
     const auto isWithin = [&](char32_t first, char32_t last) {
@@ -90,14 +51,14 @@ std::string printable(std::string_view text)
     std::string result;
     result.reserve(text.size());
     while (!text.empty()) {
-        const std::string_view before = text;
-        const char32_t character = takeCharacter(text);
-        if (character == replacement)
-            result += replacementBytes;
-        else if (isUnprintable(character))
-            result += escapeOf(character);
+        const Text::Character character = Text::firstCharacter(text);
+        if (!character.isValid)
+            Text::appendUtf8(result, Text::replacementCharacter);
+        else if (isUnprintable(character.code))
+            result += escapeOf(character.code);
         else
-            result += before.substr(0, before.size() - text.size());
+            result += text.substr(0, character.size);
+        text.remove_prefix(character.size);
     }
     return result;
 }
@@ -105,8 +66,11 @@ std::string printable(std::string_view text)
 std::size_t displayWidth(std::string_view text)
 {
     std::size_t width = 0;
-    while (!text.empty())
-        width += widthOf(takeCharacter(text));
+    while (!text.empty()) {
+        const Text::Character character = Text::firstCharacter(text);
+        width += widthOf(character.code);
+        text.remove_prefix(character.size);
+    }
     return width;
 }
 
@@ -114,14 +78,14 @@ std::string cutToWidth(std::string_view text, std::size_t width)
 {
     if (displayWidth(text) <= width)
         return std::string(text);
-    std::string_view rest = text;
     std::size_t used = 0;
     std::size_t fits = 0; // bytes that fit beside the ellipsis
-    while (!rest.empty()) {
-        used += widthOf(takeCharacter(rest));
+    for (;;) {
+        const Text::Character character = Text::firstCharacter(text.substr(fits));
+        used += widthOf(character.code);
         if (used > width - 1)
             break;
-        fits = text.size() - rest.size();
+        fits += character.size;
     }
     return std::string(text.substr(0, fits)).append(ellipsis);
 }

@@ -11,10 +11,6 @@
 
 namespace Tools {
 
-// Takes the first character off the text, which is not empty. A byte that begins no character
-// is taken off alone and counts as U+FFFD.
-char32_t takeCharacter(std::string_view& text);
-
 // Whether a terminal might obey the character instead of showing it, or show its neighbours in
 // another order: controls, line and paragraph separators, bidirectional controls.
 bool isUnprintable(char32_t character);

@@ -2,7 +2,7 @@
 
 #include "tools/serve/ConfigurationFile.h"
 
-#include "host/cimxml/Characters.h"
+#include "platform/text/Trim.h"
 #include "tools/UsageError.h"
 
 #include <CLI/CLI.hpp>
@@ -19,7 +19,7 @@ namespace Tools {
 
 namespace {
 
-using Host::CimXml::trimmed;
+using Text::trimmed;
 
 // Of the command line alone.
 constexpr std::string_view nameOfFileOption = "config";

@@ -2,11 +2,12 @@
 
 #include "platform/instrumentation/hwmon/HwmonSource.h"
 
-#include "platform/instrumentation/Utf8.h"
 #include "platform/instrumentation/hwmon/ChannelReader.h"
 #include "platform/instrumentation/hwmon/Chip.h"
 #include "platform/instrumentation/hwmon/ChipList.h"
 #include "platform/instrumentation/hwmon/Status.h"
+#include "platform/text/Trim.h"
+#include "platform/text/Utf8.h"
 
 #include <algorithm>
 #include <iterator>
@@ -44,7 +45,7 @@ unsigned baseUnitsOf(sensors_feature_type type)
 
 std::string descriptionOf(const Hwmon::Feature& feature)
 {
-    const std::string label = toValidUtf8(trimBlanks(Hwmon::labelOf(feature)));
+    const std::string label = Text::toValidUtf8(Text::trimmed(Hwmon::labelOf(feature)));
     return label.empty() ? feature.feature->name : label;
 }
 

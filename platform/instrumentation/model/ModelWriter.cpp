@@ -2,8 +2,8 @@
 
 #include "platform/instrumentation/model/ModelWriter.h"
 
-#include "platform/instrumentation/Utf8.h"
 #include "platform/instrumentation/model/ModelMembers.h"
+#include "platform/text/Utf8.h"
 
 #include <nlohmann/json.hpp>
 
@@ -32,8 +32,8 @@ Json toJson(const ModelNode& node)
         json[std::string(name)] = std::move(value);
     };
     set(Member::type, nameOf(node.type));
-    set(Member::path, toValidUtf8(node.path));
-    set(Member::description, toValidUtf8(node.description));
+    set(Member::path, Text::toValidUtf8(node.path));
+    set(Member::description, Text::toValidUtf8(node.description));
     set(Member::sensorType, node.sensorType);
     set(Member::status, node.values.status);
     if (node.values.possibleStates)

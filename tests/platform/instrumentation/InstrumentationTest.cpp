@@ -175,7 +175,7 @@ TEST(Cursor, makesPathsPrintable)
     const CountingMachine machine;
     const Instrumentation cursor;
     EXPECT_EQ(cursor.convertPathToString("/board/cpu 0/temp1"), "/board/cpu 0/temp1");
-    EXPECT_EQ(cursor.convertPathToString("/a\n\xFF"), "/a\\x0a\xEF\xBF\xBD");
+    EXPECT_EQ(cursor.convertPathToString("/a\n\xFF"), "/a\\n\xEF\xBF\xBD");
 }
 
 TEST(Settings, anUnknownKindOfSourceIsNamed)

@@ -290,7 +290,7 @@ TEST(HostileModel, aLongStringIsCutInTheMessage)
 TEST(HostileModel, controlCharactersAreEscapedInTheMessage)
 {
     EXPECT_EQ(errorOf([] { readModel(nodeWith(R"("a\nb":1)")); }),
-        "/nodes/0/a\\x0ab: there is no such member");
+        "/nodes/0/a\\nb: there is no such member");
 }
 
 } // namespace ModelReaderTests

@@ -1,0 +1,48 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "platform/text/Escape.h"
+
+namespace Text {
+
+namespace {
+
+void appendEscape(std::string& out, char character)
+{
+    constexpr std::string_view digits = "0123456789ABCDEF";
+    if (character == '\n') {
+        out += "\\n";
+        return;
+    }
+    const auto code = static_cast<unsigned char>(character);
+    out.append("\\x").append(1, digits[code >> 4U]).append(1, digits[code & 0xFU]);
+}
+
+bool isControl(char character)
+{
+    return static_cast<unsigned char>(character) < 0x20 || character == 0x7F;
+}
+
+} // namespace
+
+void appendEscaped(std::string& out, std::string_view text, Backslash backslash)
+{
+    for (const char character : text) {
+        if (isControl(character)) {
+            appendEscape(out, character);
+            continue;
+        }
+        if (character == '\\' && backslash == Backslash::doubled)
+            out += '\\';
+        out += character;
+    }
+}
+
+std::string escapeControls(std::string_view text)
+{
+    std::string printable;
+    printable.reserve(text.size());
+    appendEscaped(printable, text, Backslash::kept);
+    return printable;
+}
+
+} // namespace Text

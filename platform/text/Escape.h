@@ -1,0 +1,22 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// Control characters made visible, so that a text stays on its line and no terminal obeys it.
+
+#pragma once
+
+#include <string>
+#include <string_view>
+
+namespace Text {
+
+// Whether a backslash of the text is doubled, which keeps it apart from that of an escape.
+enum class Backslash { kept, doubled };
+
+// Appends the text with `\n` for a newline and `\xNN` for every other control character of ASCII.
+// Other bytes, those from 0x80 up among them, stay as they are.
+void appendEscaped(std::string& out, std::string_view text, Backslash backslash);
+
+// Returns the text escaped in that way, with its backslashes kept.
+std::string escapeControls(std::string_view text);
+
+} // namespace Text
