@@ -8,9 +8,9 @@
 #include "factory/InstanceWriter.h"
 #include "factory/PropertySelection.h"
 #include "factory/SensorFactory.h"
+#include "platform/locale/FormatText.h"
 #include "platform/locale/Locale.h"
 #include "platform/locale/ResourceString.h"
-#include "platform/locale/formatText.h"
 #include "platform/utilities/ProviderUtilities.h"
 
 #include <cmpimacs.h>
@@ -23,7 +23,7 @@ namespace {
 
 constexpr const char* Function = "makeSensorInstance";
 
-// The number by which the message catalogs know this library.
+// The number by which the localised texts know this library.
 constexpr unsigned long ResourceComponent = 2;
 
 // Captions and descriptions are cut to one character less than this.

@@ -2,7 +2,7 @@
 
 #include "platform/locale/Locale.h"
 
-#include "platform/locale/CatalogName.h"
+#include "platform/utilities/ProviderUtilities.h"
 
 #include <cstdlib>
 #include <string_view>
@@ -13,7 +13,7 @@ namespace {
 
 constexpr unsigned long sensorProfileComponent = 2;
 
-std::string_view languageOfEnvironment()
+std::string_view localeOfEnvironment()
 {
     for (const char* variable : {"LC_ALL", "LC_MESSAGES", "LANG"}) {
         const char* const value = ::secure_getenv(variable);
@@ -27,19 +27,17 @@ std::string_view languageOfEnvironment()
 
 std::string Locale::getLanguageId()
 {
-    const std::string_view locale = languageOfEnvironment();
+    const std::string_view locale = localeOfEnvironment();
     const std::string_view language = locale.substr(0, locale.find_first_of(".@"));
-    if (language == "C" || language == "POSIX" || !isPlainName(language))
-        return "en";
-    return std::string(language);
+    const bool isUnset = language.empty() || language == "C" || language == "POSIX";
+    return isUnset ? "en" : std::string(language);
 }
 
 std::wstring Locale::getResourceLibrary(unsigned long component, std::string language)
 {
-    const std::wstring domain = component == sensorProfileComponent
-                                    ? L"sensor-profile"
-                                    : L"component-" + std::to_wstring(component);
-    return CatalogName::join(language, domain);
+    return make_wstring(language) + (component == sensorProfileComponent
+                                            ? L"/sensor-profile"
+                                            : L"/component-" + std::to_wstring(component));
 }
 
 } // namespace Vorn

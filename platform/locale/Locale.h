@@ -1,6 +1,7 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Language and message catalogs of the process, found without touching its global locale.
+// The language of the process, read from its environment; its global locale is neither used nor
+// changed.
 
 #pragma once
 
@@ -8,17 +9,16 @@
 
 namespace Vorn {
 
-// May be called from any thread, as long as none changes the environment meanwhile.
+// Thread-safe as long as no thread changes the environment.
 class Locale {
 public:
-    // The language of messages: the first of LC_ALL, LC_MESSAGES and LANG that is set and not
-    // empty, without its encoding and modifier ("de_DE" of "de_DE.UTF-8@euro"); "en" when it is
-    // C or POSIX, when it is no language name at all and when none is set.
+    // Returns the language of messages: the first of LC_ALL, LC_MESSAGES and LANG that is set and
+    // not empty, without its encoding and modifier ("de_DE" for "de_DE.UTF-8@euro"); "en" for C and
+    // POSIX and when none is set.
     static std::string getLanguageId();
 
-    // The name of the message catalog of a component in a language, for ResourceString:
-    // "de_DE/sensor-profile", the language and the gettext domain. Component 2 is the sensor
-    // profile; for any other the name is that of a catalog that does not exist.
+    // Returns the name of a component's texts in a language, for ResourceString:
+    // "de_DE/sensor-profile". Component 2 is the sensor profile; no other has texts.
     static std::wstring getResourceLibrary(unsigned long component, std::string language);
 };
 

@@ -8,17 +8,15 @@
 
 namespace Vorn {
 
-// A text of a message catalog. A text that is missing, or that does not hold exactly one %s
-// and no other conversion, is replaced by the built-in English one, so that a catalog is never
-// trusted as a format. Catalogs are loaded at their first use and kept until the library is
-// unloaded; making another ResourceString costs a look-up. Any thread may make one.
+// A text that holds exactly one %s, in the language of a resource library: that of "de" for
+// "de_AT", and English for a language or a component that has no texts. Thread-safe.
 class ResourceString {
 public:
-    // `library` is a name from Locale::getResourceLibrary, `messageId` for instance
-    // MSGID_SENSOR_CAPTION. Throws only for lack of memory.
+    // `library` is a name from Locale::getResourceLibrary. `messageId` is, for instance,
+    // MSGID_SENSOR_CAPTION; the text of an unknown message is the insert alone.
     ResourceString(const std::wstring& library, const std::wstring& messageId);
 
-    // A format for formatText.
+    // Returns a format for formatText.
     const std::wstring& text() const noexcept { return text_; }
 
 private:

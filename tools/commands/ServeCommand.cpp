@@ -1,8 +1,5 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-#include "host/broker/CollectedResult.h"
-#include "host/broker/Refusal.h"
-#include "host/broker/Request.h"
 #include "host/http/EventLog.h"
 #include "host/http/Privileges.h"
 #include "host/http/Server.h"
@@ -111,25 +108,6 @@ std::vector<std::string> modelFiles()
     return files;
 }
 
-// Makes the providers load the catalogs of their texts while root can read them: the user that
-// serves may not. That the sensors cannot be read now is no reason not to serve them later.
-void loadCatalogs(Host::Manager& manager)
-{
-    {
-        Host::Request request(manager.broker());
-        Host::CollectedResult found;
-        const char* texts[] = {"Caption", "Description", nullptr};
-        try {
-            manager.enumerateInstances(
-                request.context(), request.makePath(nameSpace, sensorClass), texts, found);
-        } catch (const Host::Refusal& refusal) {
-            report({"loadCatalogs", "ServeCommand", __LINE__},
-                std::string("the catalogs of texts are not loaded: ") + refusal.what());
-        }
-    }
-    ::malloc_trim(0); // what the sensors of a large machine took
-}
-
 // A server whose log is lost from the beginning is nothing to rely on. One that loses it later
 // goes on.
 void beginLog(const std::string& text, Output& out)
@@ -206,8 +184,6 @@ public:
             options_.operations);
         MemoryReturn operations(objects);
         objects.manager().preload();
-        if (Host::Http::isRoot() && options_.user != "root")
-            loadCatalogs(objects.manager());
         beginLog(renounceRoot(options_.user), out);
         for (const std::string& file : modelFiles())
             requireReadable(file);
