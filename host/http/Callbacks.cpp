@@ -2,10 +2,9 @@
 
 #include "host/http/Callbacks.h"
 
-#include "host/http/ClientConnection.h"
-#include "host/http/Connections.h"
 #include "host/http/Daemon.h"
 #include "host/http/EventLog.h"
+#include "host/http/Service.h"
 
 #include <gnutls/gnutls.h>
 #include <sys/socket.h>
@@ -47,7 +46,7 @@ std::shared_ptr<const Certificate> showCertificate(const Daemon& daemon, MHD_Con
         ::MHD_get_connection_info(connection, MHD_CONNECTION_INFO_GNUTLS_SESSION);
     if (!daemon.isEncrypted() || info == nullptr)
         return nullptr;
-    auto certificate = daemon.certificate();
+    auto certificate = daemon.service().certificate.get();
     ::gnutls_credentials_set(static_cast<gnutls_session_t>(info->tls_session),
         GNUTLS_CRD_CERTIFICATE, certificate->handle());
     return certificate;

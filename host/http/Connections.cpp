@@ -4,11 +4,11 @@
 
 #include "host/http/Address.h"
 #include "host/http/EventLog.h"
-#include "host/http/Timer.h"
 
 #include <sys/socket.h>
 
 #include <algorithm>
+#include <new>
 #include <utility>
 
 namespace Host::Http {
@@ -17,16 +17,21 @@ namespace {
 
 constexpr std::chrono::milliseconds watchInterval{500};
 constexpr std::chrono::seconds complaintInterval{60};
-constexpr std::chrono::seconds lastPatience{2}; // with a request that comes in at the end
+constexpr std::chrono::seconds requestTimeoutInShutdown{2};
 
-// Whether the client will send no more, and all it sent was read.
-bool hasFallenSilent(int descriptor)
+// Returns whether the client has closed its direction and all that it sent was read.
+bool hasClientFinished(int descriptor)
 {
     char next = 0;
     return ::recv(descriptor, &next, 1, MSG_PEEK | MSG_DONTWAIT) == 0;
 }
 
 } // namespace
+
+Connections::Connections(const Limits& limits)
+    : limits_(limits), watcher_([this](const std::stop_token& stop) { watch(stop); })
+{
+}
 
 ClientConnection* Connections::add(
     int descriptor, const Address& client, std::shared_ptr<const Certificate> certificate)
@@ -44,11 +49,12 @@ ClientConnection* Connections::add(
         all_.pop_back();
         throw;
     }
-    // Its first request may begin late, but not last for ever without becoming one.
-    connection.deadline = Clock::now() + patienceIn(Phase::idle);
-    if (isWindingUp_)
+    // Bounds the handshake and the wait for the first request.
+    connection.deadline = Clock::now() + timeoutOf(Phase::idle);
+    if (isShuttingDown_)
         ::shutdown(descriptor, SHUT_RD);
-    watch();
+    if (all_.size() == 1)
+        changed_.notify_all();
     return &connection;
 }
 
@@ -77,48 +83,37 @@ void Connections::complain(const Address& client, bool areTooMany)
 
 void Connections::remove(ClientConnection& connection)
 {
-    // Ends outside the lock, with whatever it holds.
+    // The connection is destroyed, with all that it holds, when the mutex is free again.
     std::list<ClientConnection> removed;
-    {
-        const std::lock_guard lock(mutex_);
-        if (connection.phase != Phase::idle)
-            --busy_;
-        const auto count = countByNeighbourhood_.find(connection.neighbourhood);
-        if (--count->second == 0)
-            countByNeighbourhood_.erase(count);
-        const auto place = std::find_if(all_.begin(), all_.end(),
-            [&](const ClientConnection& each) { return &each == &connection; });
-        removed.splice(removed.end(), all_, place);
-    }
-    changed_.notify_all();
+    enter(connection, Phase::idle);
+    const std::lock_guard lock(mutex_);
+    const auto count = countByNeighbourhood_.find(connection.neighbourhood);
+    if (--count->second == 0)
+        countByNeighbourhood_.erase(count);
+    const auto place = std::find_if(all_.begin(), all_.end(),
+        [&](const ClientConnection& each) { return &each == &connection; });
+    removed.splice(removed.end(), all_, place);
 }
 
 void Connections::enter(ClientConnection& connection, Phase phase)
 {
-    bool hasEnded = false;
-    {
-        const std::lock_guard lock(mutex_);
-        if (connection.phase == Phase::idle && phase != Phase::idle)
-            ++busy_;
-        if (connection.phase != Phase::idle && phase == Phase::idle) {
-            --busy_;
-            hasEnded = true;
-        }
-        if (phase == Phase::idle && isWindingUp_)
-            ::shutdown(connection.descriptor, SHUT_RD);
-        connection.phase = phase;
-        connection.deadline = Clock::now() + patienceIn(phase);
-    }
-    if (hasEnded)
+    const std::lock_guard lock(mutex_);
+    if (connection.phase == Phase::idle && phase != Phase::idle)
+        ++busy_;
+    if (connection.phase != Phase::idle && phase == Phase::idle && --busy_ == 0)
         changed_.notify_all();
+    if (phase == Phase::idle && isShuttingDown_)
+        ::shutdown(connection.descriptor, SHUT_RD);
+    connection.phase = phase;
+    connection.deadline = Clock::now() + timeoutOf(phase);
 }
 
-std::chrono::seconds Connections::patienceIn(Phase phase) const
+std::chrono::seconds Connections::timeoutOf(Phase phase) const
 {
     switch (phase) {
     case Phase::receiving:
-        return isWindingUp_ ? std::min(limits_.requestTimeout, lastPatience)
-                            : limits_.requestTimeout;
+        return isShuttingDown_ ? std::min(limits_.requestTimeout, requestTimeoutInShutdown)
+                               : limits_.requestTimeout;
     case Phase::answering:
         return limits_.answerTimeout;
     default:
@@ -126,85 +121,59 @@ std::chrono::seconds Connections::patienceIn(Phase phase) const
     }
 }
 
-bool Connections::mayFallAsleep()
+void Connections::beginShutdown()
 {
     const std::lock_guard lock(mutex_);
-    if (isAwake_)
-        return false;
-    ++asleep_;
-    return true;
-}
-
-void Connections::awake()
-{
-    {
-        const std::lock_guard lock(mutex_);
-        --asleep_;
-    }
-    changed_.notify_all();
-}
-
-void Connections::windUp()
-{
-    const std::lock_guard lock(mutex_);
-    isWindingUp_ = true;
-    const auto latest = Clock::now() + patienceIn(Phase::receiving);
+    isShuttingDown_ = true;
+    const auto latest = Clock::now() + timeoutOf(Phase::receiving);
     for (ClientConnection& connection : all_) {
         if (connection.phase == Phase::idle)
             ::shutdown(connection.descriptor, SHUT_RD);
         if (connection.phase == Phase::receiving)
             connection.deadline = std::min(connection.deadline, latest);
     }
+    changed_.notify_all();
 }
 
-bool Connections::isWindingUp() const
+bool Connections::isShuttingDown() const
 {
     const std::lock_guard lock(mutex_);
-    return isWindingUp_;
+    return isShuttingDown_;
 }
 
-bool Connections::waitUntilQuiet(std::chrono::milliseconds patience)
+bool Connections::waitUntil(Clock::time_point time)
 {
     std::unique_lock lock(mutex_);
-    return changed_.wait_for(lock, patience, [this] { return busy_ == 0; });
+    return !changed_.wait_until(lock, time, [this] { return isShuttingDown_; });
 }
 
-void Connections::stopWatching()
-{
-    const std::lock_guard lock(mutex_);
-    isWatchOver_ = true;
-}
-
-void Connections::waitUntilAllAreAwake()
+bool Connections::waitUntilIdle(std::chrono::milliseconds timeout)
 {
     std::unique_lock lock(mutex_);
-    isAwake_ = true;
-    changed_.wait(lock, [this] { return asleep_ == 0; });
+    return changed_.wait_for(lock, timeout, [this] { return busy_ == 0; });
 }
 
-void Connections::watch()
+void Connections::watch(const std::stop_token& stop)
 {
-    if (isWatching_ || isWatchOver_ || all_.empty())
-        return;
-    try {
-        timer_.at(Clock::now() + watchInterval, [this] { closeOverdue(); });
-        isWatching_ = true;
-    } catch (...) {
-        return; // the next connection tries again
+    std::unique_lock lock(mutex_);
+    while (changed_.wait(lock, stop, [this] { return !all_.empty(); }) && !stop.stop_requested()) {
+        changed_.wait_for(lock, stop, watchInterval, [] { return false; });
+        try {
+            closeOverdue();
+        } catch (const std::bad_alloc&) {
+            continue; // the next round closes the others
+        }
     }
 }
 
 void Connections::closeOverdue()
 {
-    const std::lock_guard lock(mutex_);
-    isWatching_ = false;
-    watch(); // first: what follows may run out of memory
     const auto now = Clock::now();
     for (const ClientConnection& connection : all_) {
         if (connection.phase == Phase::working)
             continue;
-        // The library does not notice an end that comes together with the last bytes.
-        if (connection.phase != Phase::answering && hasFallenSilent(connection.descriptor))
+        // libmicrohttpd overlooks an end that arrives together with the last bytes.
+        if (connection.phase != Phase::answering && hasClientFinished(connection.descriptor))
             ::shutdown(connection.descriptor, SHUT_RD);
         if (now < connection.deadline)
             continue;

@@ -1,10 +1,10 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Everybody who is connected: how many, and for how long they may be still or slow.
-
 #pragma once
 
-#include "host/http/ClientConnection.h"
+#include "host/http/Address.h"
+#include "host/http/Certificate.h"
+#include "host/http/Exchange.h"
 #include "host/http/Limits.h"
 
 #include <chrono>
@@ -12,68 +12,95 @@
 #include <cstddef>
 #include <list>
 #include <map>
+#include <memory>
 #include <mutex>
+#include <optional>
 #include <string>
+#include <thread>
+#include <utility>
 
 namespace Host::Http {
 
-class Address;
-class Timer;
+enum class Phase {
+    idle,      // between requests
+    receiving, // a request comes in
+    working,   // it is carried out; the client cannot be late
+    answering, // the client fetches the answer
+};
 
-// Thread-safe. The timer must have ended before this object goes.
+// A client that is connected, from then to the end. Belongs to Connections.
+struct ClientConnection {
+    ClientConnection(
+        int socket, const Address& client, std::shared_ptr<const Certificate> shownCertificate)
+        : descriptor(socket), address(client.host()), neighbourhood(client.neighbourhood()),
+          certificate(std::move(shownCertificate))
+    {
+    }
+
+    const int descriptor;
+    const std::string address;                            // for the log
+    const std::string neighbourhood;                      // for what one address may take
+    const std::shared_ptr<const Certificate> certificate; // null without TLS
+
+    // Of Connections, which guards them.
+    Phase phase = Phase::idle;
+    std::chrono::steady_clock::time_point deadline{};
+
+    // Of the thread that serves the connection.
+    std::string target; // of the request that comes in
+    std::optional<Exchange> exchange;
+};
+
+// The connections of all clients. Bounds their number, and closes those that exceed a timeout from
+// a thread of its own. Thread-safe.
 class Connections {
 public:
-    Connections(const Limits& limits, Timer& timer) : limits_(limits), timer_(timer) {}
+    using Clock = std::chrono::steady_clock;
 
-    // Null where that would be one too many, or one too many at its address: the connection ends,
-    // which goes to the log now and then.
+    // The limits must outlive it. Throws std::system_error when the thread cannot be started.
+    explicit Connections(const Limits& limits);
+    Connections(const Connections&) = delete;
+    Connections& operator=(const Connections&) = delete;
+
+    // Returns null where the connection exceeds a limit: it is shut down, and the log says so at
+    // most once a minute.
     ClientConnection* add(
         int descriptor, const Address& client, std::shared_ptr<const Certificate> certificate);
-    // The exchange must have ended.
+    // REQUIRES: the connection's exchange is destroyed.
     void remove(ClientConnection& connection);
 
     void enter(ClientConnection& connection, Phase phase);
 
-    // To be asked before a connection is put to sleep; false when there is no time for that any
-    // more. Pairs with awake().
-    bool mayFallAsleep();
-    void awake();
-
-    // From now on no connection is kept for a further request; those without one end now, the
-    // others with theirs, or soon where it does not come in.
-    void windUp();
-    bool isWindingUp() const;
-    // Waits until no request is at work, at most so long; whether that is so then.
-    bool waitUntilQuiet(std::chrono::milliseconds patience);
-    // Nobody is too slow any more. To be called before the timer ends.
-    void stopWatching();
-    // No connection may fall asleep any more. Returns when all have woken up.
-    void waitUntilAllAreAwake();
+    // From now on no connection stays open for a further request. Idle connections are closed now,
+    // the others after their answer, or soon when their request does not arrive. Idempotent.
+    void beginShutdown();
+    bool isShuttingDown() const;
+    // Blocks until then, but no longer than until the shutdown begins. Returns whether the time was
+    // reached.
+    bool waitUntil(Clock::time_point time);
+    // Blocks until no request is in progress, at most for the timeout. Returns whether that was
+    // reached.
+    bool waitUntilIdle(std::chrono::milliseconds timeout);
 
 private:
-    using Clock = std::chrono::steady_clock;
-
-    void closeOverdue();
+    void watch(const std::stop_token& stop);
 
     // REQUIRES: the mutex is held.
-    std::chrono::seconds patienceIn(Phase phase) const;
+    void closeOverdue();
+    std::chrono::seconds timeoutOf(Phase phase) const;
     bool hasRoomFor(const Address& client, const std::string& neighbourhood);
     void complain(const Address& client, bool areTooMany);
-    void watch();
 
     const Limits& limits_;
-    Timer& timer_;
     mutable std::mutex mutex_;
-    std::condition_variable changed_;
+    // A first connection, the end of the last request in progress, the beginning of the shutdown.
+    std::condition_variable_any changed_;
     std::list<ClientConnection> all_;
     std::map<std::string, std::size_t> countByNeighbourhood_;
-    std::size_t busy_ = 0;   // connections that are not idle
-    std::size_t asleep_ = 0; // connections whose thread of service waits for somebody to wake them
-    bool isWatching_ = false;
-    bool isWatchOver_ = false;
-    bool isWindingUp_ = false;
-    bool isAwake_ = false; // for good
+    std::size_t busy_ = 0; // connections that are not idle
+    bool isShuttingDown_ = false;
     Clock::time_point lastComplaint_{};
+    std::jthread watcher_; // last: it uses all of the above
 };
 
 } // namespace Host::Http

@@ -3,8 +3,7 @@
 #include "host/http/Daemon.h"
 
 #include "host/http/Callbacks.h"
-#include "host/http/Certificate.h"
-#include "host/http/Exchange.h"
+#include "host/http/Service.h"
 
 #include <microhttpd.h>
 
@@ -24,15 +23,13 @@ constexpr const char* tlsVersions = "NORMAL:-VERS-ALL:+VERS-TLS1.3:+VERS-TLS1.2:
 // For a head, beside which the beginning of the body or a piece of the answer must find place.
 constexpr std::size_t memoryBesideHead = std::size_t{48} << 10;
 
-template <typename Function>
-void* pointerTo(Function* function)
-{
-    return reinterpret_cast<void*>(function);
-}
+// Providers run on the threads of the connections.
+constexpr std::size_t stackSize = std::size_t{512} << 10;
 
 unsigned flagsFor(const ListeningSocket& socket)
 {
-    unsigned flags = MHD_USE_EPOLL_INTERNAL_THREAD | MHD_ALLOW_SUSPEND_RESUME | MHD_USE_ERROR_LOG;
+    unsigned flags = MHD_USE_POLL_INTERNAL_THREAD | MHD_USE_THREAD_PER_CONNECTION | MHD_USE_ITC |
+                     MHD_USE_ERROR_LOG;
     if (socket.isEncrypted())
         flags |= MHD_USE_TLS;
     if (socket.address().isIpv6())
@@ -47,10 +44,10 @@ void Daemon::Stopping::operator()(MHD_Daemon* daemon) const
     ::MHD_stop_daemon(daemon);
 }
 
-Daemon::Daemon(Service& service, ListeningSocket socket, CertificateSource certificates)
-    : service_(service), socket_(std::move(socket)), certificates_(std::move(certificates))
+Daemon::Daemon(Service& service, ListeningSocket socket)
+    : service_(service), socket_(std::move(socket))
 {
-    const auto certificate = isEncrypted() ? certificates_() : nullptr;
+    const auto certificate = isEncrypted() ? service_.certificate.get() : nullptr;
     start(certificate.get());
 }
 
@@ -71,6 +68,7 @@ void Daemon::start(const Certificate* certificate)
             nullptr},
         // One more than there may be, so that one too many is told.
         {MHD_OPTION_CONNECTION_LIMIT, number(limits.maximumConnections + 1), nullptr},
+        {MHD_OPTION_THREAD_STACK_SIZE, number(stackSize), nullptr},
         {MHD_OPTION_CONNECTION_TIMEOUT, static_cast<std::intptr_t>(limits.idleTimeout.count()),
             nullptr},
         {MHD_OPTION_NOTIFY_CONNECTION,
@@ -91,7 +89,7 @@ void Daemon::start(const Certificate* certificate)
     daemon_.reset(::MHD_start_daemon(flagsFor(socket_), 0, nullptr, nullptr,
         &Callbacks::requestGoesOn, this, MHD_OPTION_ARRAY, options.data(), MHD_OPTION_END));
     if (!daemon_)
-        throw std::runtime_error("cannot serve " + address().text() +
+        throw std::runtime_error("cannot serve " + socket_.address().text() +
                                  ": the HTTP library did not start, the log may tell why");
 }
 

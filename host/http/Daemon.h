@@ -1,12 +1,9 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The HTTP library's side of one listening socket.
-
 #pragma once
 
 #include "host/http/ListeningSocket.h"
 
-#include <functional>
 #include <memory>
 
 struct MHD_Daemon;
@@ -16,29 +13,25 @@ namespace Host::Http {
 class Certificate;
 struct Service;
 
-// Serves the clients of the socket on a thread of its own.
+// libmicrohttpd's daemon for one listening socket: a thread accepts connections, and each of them
+// has a thread of its own.
 class Daemon {
 public:
-    using CertificateSource = std::function<std::shared_ptr<const Certificate>()>;
-
-    // The source is asked for each connection, and must give one where the socket is encrypted.
-    // Throws std::runtime_error when the library fails. The service must outlive it.
-    Daemon(Service& service, ListeningSocket socket, CertificateSource certificates);
-    // REQUIRES: no connection is asleep nor may fall asleep.
+    // Throws std::runtime_error when the library fails. The service must outlive it, and have a
+    // certificate where the socket is encrypted.
+    Daemon(Service& service, ListeningSocket socket);
+    // Closes all connections and joins their threads. REQUIRES: the shutdown of the service's
+    // connections has begun.
     ~Daemon();
     Daemon(const Daemon&) = delete;
     Daemon& operator=(const Daemon&) = delete;
 
-    // With the actual port; stays after stopAccepting().
-    const Address& address() const { return socket_.address(); }
-    bool isEncrypted() const { return socket_.isEncrypted(); }
-
-    // Nobody can connect any more; those who are connected stay. Idempotent.
+    // From now on no client can connect; connections that are open stay. Idempotent.
     void stopAccepting();
 
-    // For the library's calls back.
+    // For the callbacks of the library.
+    bool isEncrypted() const { return socket_.isEncrypted(); }
     Service& service() const { return service_; }
-    std::shared_ptr<const Certificate> certificate() const { return certificates_(); }
 
 private:
     struct Stopping {
@@ -49,7 +42,6 @@ private:
 
     Service& service_;
     ListeningSocket socket_;
-    CertificateSource certificates_;
     std::unique_ptr<MHD_Daemon, Stopping> daemon_;
     bool isAccepting_ = true;
 };

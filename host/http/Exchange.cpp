@@ -4,13 +4,9 @@
 
 #include "host/cimxml/Message.h"
 #include "host/cimxml/RequestError.h"
-#include "host/http/ClientConnection.h"
-#include "host/http/Connections.h"
 #include "host/http/EventLog.h"
 #include "host/http/Response.h"
-#include "host/http/SignIns.h"
-#include "host/http/Timer.h"
-#include "host/http/WorkerPool.h"
+#include "host/http/Service.h"
 
 #include <microhttpd.h>
 
@@ -35,13 +31,18 @@ HttpError unavailable(const std::string& reason)
     return {Status::unavailable, reason, {}, {{"Retry-After", "1"}}};
 }
 
-constexpr const char* ending = "the server is ending";
+WorkSlots::Slot takeSlot(WorkSlots& slots)
+{
+    auto slot = slots.take();
+    if (!slot)
+        throw unavailable("too many requests are waiting");
+    return slot;
+}
 
 } // namespace
 
 bool Exchange::begin(const RequestHead& head, std::size_t headSize)
 {
-    state_ = State::receiving;
     try {
         bodySize_ = bodySizeOf(head);
         if (headSize > service_.limits.maximumHeader)
@@ -53,7 +54,8 @@ bool Exchange::begin(const RequestHead& head, std::size_t headSize)
         if (service_.signIns.areDemanded())
             signIn(head);
     } catch (const HttpError& error) {
-        return refuse(error);
+        error_ = error;
+        return refuse();
     }
     return true;
 }
@@ -65,92 +67,59 @@ void Exchange::signIn(const RequestHead& head)
     if (!credentials)
         throw unauthorized();
     caller_.principal = credentials->user;
-    const auto now = std::chrono::steady_clock::now();
-    if (service_.signIns.isKnown(*credentials, client_.address, now))
+    if (service_.signIns.isKnown(*credentials, client_.address, std::chrono::steady_clock::now()))
         return;
-    if (!service_.connections.mayFallAsleep())
-        throw unavailable(ending);
-    service_.connections.enter(client_, Phase::working);
-    fallAsleep(State::signingIn);
-    tryPasswordAt(service_.signIns.admission(client_.neighbourhood, now), *credentials);
+    enter(Phase::working);
+    if (!isPasswordRight(*credentials))
+        throw unauthorized();
+    enter(Phase::receiving);
 }
 
-void Exchange::tryPasswordAt(
-    std::chrono::steady_clock::time_point time, const Credentials& credentials)
-{
-    try {
-        const auto hand = [this, credentials] {
-            handOver([this, credentials] { tryPassword(credentials); });
-        };
-        if (time <= std::chrono::steady_clock::now())
-            hand();
-        else
-            service_.timer.atOrSooner(time, hand);
-    } catch (...) {
-        isLost_ = true;
-        wakeUp();
-    }
-}
-
-void Exchange::tryPassword(const Credentials& credentials)
+// Returns false for a wrong password, and not before the client may know.
+bool Exchange::isPasswordRight(const Credentials& credentials)
 {
     SignIns& signIns = service_.signIns;
-    try {
-        // Somebody else at the address may have failed meanwhile.
+    for (;;) {
+        auto slot = takeSlot(service_.work);
         const auto now = std::chrono::steady_clock::now();
         const auto admission = signIns.admit(client_.neighbourhood, now);
-        if (admission > now && !service_.connections.isWindingUp())
-            return tryPasswordAt(admission, credentials);
-        if (admission > now) {
-            error_ = unavailable(ending);
-            return wakeUp();
+        if (admission <= now) {
+            const auto refusal =
+                signIns.tryPassword(credentials, client_.address, client_.neighbourhood, now);
+            slot.reset();
+            if (refusal)
+                service_.connections.waitUntil(*refusal);
+            return !refusal;
         }
-        const auto refusal =
-            signIns.tryPassword(credentials, client_.address, client_.neighbourhood, now);
-        if (!refusal)
-            return wakeUp();
-        error_ = unauthorized();
-        service_.timer.atOrSooner(*refusal, [this] { wakeUp(); });
-    } catch (...) {
-        isLost_ = true;
-        wakeUp();
+        slot.reset();
+        if (!service_.connections.waitUntil(admission))
+            throw unavailable("the server is ending");
     }
 }
 
 // REQUIRES: none of the body was received.
-bool Exchange::refuse(const HttpError& error)
+bool Exchange::refuse()
 {
-    error_ = error;
-    // A client that still sends would not see an answer before it has finished, or not at all;
-    // and the library ends connections that are answered before the request's end.
+    // A client that still sends would not see an answer before it has finished, or not at all:
+    // libmicrohttpd closes connections that are answered before the end of the body.
     const bool isBodyBearable = bodySize_.bytes.value_or(0) <= 2 * service_.limits.maximumBody;
-    if (isBodyBearable && !bodySize_.isAwaited && !error.endsConnection()) {
-        state_ = State::discarding;
-        return true;
-    }
-    return sendError();
+    if (!isBodyBearable || bodySize_.isAwaited || error_->endsConnection())
+        return sendError();
+    enter(Phase::receiving);
+    state_ = State::discarding;
+    return true;
 }
 
 bool Exchange::proceed(std::string_view piece)
 {
-    if (isLost_)
-        return false;
-    if (isHeadToBeRepeated_) {
-        isHeadToBeRepeated_ = false;
-        state_ = State::receiving;
-        service_.connections.enter(client_, Phase::receiving);
-        return error_ ? refuse(HttpError(*error_)) : true;
-    }
     switch (state_) {
     case State::receiving:
-        return receive(piece);
+        return piece.empty() ? execute() : receive(piece);
     case State::discarding:
         if (piece.empty())
             return sendError();
         discarded_ += piece.size();
         return discarded_ <= 2 * service_.limits.maximumBody;
-    case State::working:
-        return error_ ? sendError() : sendAnswer();
     default:
         return false;
     }
@@ -158,8 +127,6 @@ bool Exchange::proceed(std::string_view piece)
 
 bool Exchange::receive(std::string_view piece)
 {
-    if (piece.empty())
-        return startWork();
     if (body_.size() + piece.size() <= service_.limits.maximumBody) {
         body_.append(piece);
         return true;
@@ -172,46 +139,29 @@ bool Exchange::receive(std::string_view piece)
     return true;
 }
 
-bool Exchange::startWork()
+bool Exchange::execute()
 {
-    if (!service_.connections.mayFallAsleep()) {
-        error_ = unavailable(ending);
-        return sendError();
-    }
-    service_.connections.enter(client_, Phase::working);
-    fallAsleep(State::working);
-    handOver([this] { work(); });
-    return true;
-}
-
-void Exchange::work() noexcept
-{
+    enter(Phase::working);
     try {
-        try {
-            carryOut();
-        } catch (const HttpError& error) {
-            error_ = error;
-        } catch (const CimXml::RequestError& error) {
-            error_ = HttpError(error);
-        } catch (const std::bad_alloc&) {
-            throw;
-        } catch (const std::exception& error) {
-            report(
-                {"work", "Exchange", __LINE__}, std::string("a request failed: ") + error.what());
-            error_ = HttpError(Status::internalError, "the request failed; the log tells why");
-        }
-        if (error_)
-            answer_.drop();
-    } catch (...) {
-        report({"work", "Exchange", __LINE__}, "no memory for a request");
-        isLost_ = true;
+        runOperation();
+        return sendAnswer();
+    } catch (const HttpError& error) {
+        error_ = error;
+    } catch (const CimXml::RequestError& error) {
+        error_ = HttpError(error);
+    } catch (const std::bad_alloc&) {
+        throw;
+    } catch (const std::exception& error) {
+        report({"execute", "Exchange", __LINE__}, std::string("a request failed: ") + error.what());
+        error_ = HttpError(Status::internalError, "the request failed; the log tells why");
     }
-    wakeUp();
+    return sendError();
 }
 
-void Exchange::carryOut()
+void Exchange::runOperation()
 {
-    // The message goes before the answer, which may give back the memory of both.
+    const auto slot = takeSlot(service_.work);
+    // The message is destroyed before the answer, which may return the memory of both.
     const auto answer = [this] {
         const CimXml::Message message(body_, service_.limits.maximumDepth);
         body_ = {};
@@ -221,31 +171,15 @@ void Exchange::carryOut()
     answer_.begin(answer(), service_.unsent);
 }
 
-void Exchange::fallAsleep(State state)
+void Exchange::enter(Phase phase)
 {
-    state_ = state;
-    isHeadToBeRepeated_ = state == State::signingIn;
-    ::MHD_suspend_connection(&connection_);
-}
-
-void Exchange::handOver(std::function<void()> job) noexcept
-{
-    try {
-        if (service_.workers.take(std::move(job)))
-            return;
-        error_ = unavailable("too many requests are waiting");
-    } catch (...) {
-        isLost_ = true;
-    }
-    wakeUp();
-}
-
-// The last thing a worker does with the exchange: its connection's thread takes over.
-void Exchange::wakeUp() noexcept
-{
-    Connections& connections = service_.connections;
-    ::MHD_resume_connection(&connection_);
-    connections.awake();
+    service_.connections.enter(client_, phase);
+    // To libmicrohttpd the client is silent while its request is worked on. The time counts anew
+    // when a timeout follows none.
+    const auto timeout =
+        phase == Phase::working ? std::chrono::seconds(0) : service_.limits.idleTimeout;
+    ::MHD_set_connection_option(
+        &connection_, MHD_CONNECTION_OPTION_TIMEOUT, static_cast<unsigned>(timeout.count()));
 }
 
 bool Exchange::sendAnswer()
@@ -255,7 +189,7 @@ bool Exchange::sendAnswer()
         answer_.isWhole() ? Response::whole(answer_.text()) : Response::inPieces(answer_);
     for (const HeaderField& field : answerFieldsFor(head_))
         response.add(field);
-    if (service_.connections.isWindingUp())
+    if (service_.connections.isShuttingDown())
         response.endConnection();
     return send(response, Status::ok);
 }
@@ -269,7 +203,7 @@ bool Exchange::sendError()
         response.add({"CIMError", error_->cimError()});
     for (const HeaderField& field : error_->fields())
         response.add(field);
-    if (error_->endsConnection() || service_.connections.isWindingUp())
+    if (error_->endsConnection() || service_.connections.isShuttingDown())
         response.endConnection();
     return send(response, error_->status());
 }
@@ -279,7 +213,7 @@ bool Exchange::send(Response& response, unsigned status)
     if (isMentionWanted())
         mention({"send", "Exchange", __LINE__}, summary(status));
     state_ = State::answered;
-    service_.connections.enter(client_, Phase::answering);
+    enter(Phase::answering);
     return response.queue(connection_, status);
 }
 

@@ -1,7 +1,5 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// A request, what becomes of it, and its answer.
-
 #pragma once
 
 #include "host/cimxml/OperationHandler.h"
@@ -10,9 +8,7 @@
 #include "host/http/HttpError.h"
 #include "host/http/PendingAnswer.h"
 
-#include <chrono>
 #include <cstddef>
-#include <functional>
 #include <optional>
 #include <string>
 #include <string_view>
@@ -21,26 +17,13 @@ struct MHD_Connection;
 
 namespace Host::Http {
 
-class Connections;
 class Response;
-class SignIns;
-class Timer;
-class WorkerPool;
+enum class Phase;
 struct ClientConnection;
+struct Service;
 
-// What all exchanges share. Outlives them.
-struct Service {
-    CimXml::OperationHandler& operations;
-    const Limits& limits;
-    SignIns& signIns;
-    Connections& connections;
-    Timer& timer;
-    WorkerPool& workers;
-    UnsentObjects& unsent;
-};
-
-// Driven by the thread that serves the connection. While a password is checked or an operation
-// runs, the connection sleeps, and the exchange is the worker's.
+// One request and its answer. Runs on its connection's thread, which blocks while a password is
+// checked and while the operation runs.
 class Exchange {
 public:
     Exchange(Service& service, ClientConnection& client, MHD_Connection& connection)
@@ -50,33 +33,25 @@ public:
     Exchange(const Exchange&) = delete;
     Exchange& operator=(const Exchange&) = delete;
 
-    // To be called with the head when it has come, then with each piece of the body, with an
-    // empty piece at its end, and whenever the connection has woken up. False when the connection
-    // must be closed without an answer.
+    // begin() takes the head; proceed() each piece of the body, and an empty piece at its end. Both
+    // return false when the connection must be closed without an answer, and throw std::bad_alloc.
     bool begin(const RequestHead& head, std::size_t headSize);
     bool proceed(std::string_view piece);
 
 private:
     enum class State {
-        fresh,
-        signingIn, // asleep
         receiving,
-        discarding, // the error is known, the client still sends
-        working,    // asleep
+        discarding, // there is an error, which is sent at the end of the body
         answered,
     };
 
     void signIn(const RequestHead& head);
-    void tryPasswordAt(std::chrono::steady_clock::time_point time, const Credentials& credentials);
-    void tryPassword(const Credentials& credentials);
-    bool refuse(const HttpError& error);
+    bool isPasswordRight(const Credentials& credentials);
+    bool refuse();
     bool receive(std::string_view piece);
-    bool startWork();
-    void work() noexcept;
-    void carryOut();
-    void fallAsleep(State state);
-    void handOver(std::function<void()> job) noexcept;
-    void wakeUp() noexcept;
+    bool execute();
+    void runOperation();
+    void enter(Phase phase);
 
     bool sendAnswer();
     bool sendError();
@@ -86,17 +61,15 @@ private:
     Service& service_;
     ClientConnection& client_;
     MHD_Connection& connection_;
-    State state_ = State::fresh;
+    State state_ = State::receiving;
 
     BodySize bodySize_;
     CallHead head_;
     CimXml::Caller caller_;
     std::string body_;
     std::size_t discarded_ = 0;
-    bool isHeadToBeRepeated_ = false;
 
     std::optional<HttpError> error_;
-    bool isLost_ = false; // not even an error can be told
 
     PendingAnswer answer_;
     std::string errorText_;

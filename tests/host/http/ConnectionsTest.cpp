@@ -3,7 +3,6 @@
 // What is counted of clients, without clients.
 
 #include "host/http/Connections.h"
-#include "host/http/Timer.h"
 #include "host/http/UnsentObjects.h"
 
 #include <gtest/gtest.h>
@@ -20,8 +19,7 @@ TEST(ConnectionsTest, AreNotTooManyHoweverManyAddThem)
 {
     Host::Http::Limits limits;
     limits.maximumConnections = 20;
-    Host::Http::Timer timer;
-    Host::Http::Connections connections(limits, timer);
+    Host::Http::Connections connections(limits);
     const Host::Http::Address client("127.0.0.1", 0);
     std::mutex mutex;
     std::vector<Host::Http::ClientConnection*> added;
@@ -40,16 +38,13 @@ TEST(ConnectionsTest, AreNotTooManyHoweverManyAddThem)
     for (auto* const connection : added)
         connections.remove(*connection);
     EXPECT_NE(connections.add(-1, client, nullptr), nullptr);
-    connections.stopWatching();
-    timer.end();
 }
 
 TEST(ConnectionsTest, OneTooManyAtAnAddressEnds)
 {
     Host::Http::Limits limits;
     limits.maximumConnectionsPerAddress = 1;
-    Host::Http::Timer timer;
-    Host::Http::Connections connections(limits, timer);
+    Host::Http::Connections connections(limits);
     int ends[2];
     ASSERT_EQ(::socketpair(AF_UNIX, SOCK_STREAM, 0, ends), 0);
     EXPECT_NE(connections.add(-1, {"127.0.0.1", 1}, nullptr), nullptr);
@@ -59,8 +54,6 @@ TEST(ConnectionsTest, OneTooManyAtAnAddressEnds)
     EXPECT_EQ(::recv(ends[1], &byte, 1, MSG_DONTWAIT), 0);
     for (const int end : ends)
         ::close(end);
-    connections.stopWatching();
-    timer.end();
 }
 
 TEST(UnsentObjectsTest, AreBoundedButForOneAnswerThatIsAlone)

@@ -1,9 +1,11 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Requests in files, hostile ones for the most part, with what is expected to come of them.
+// Requests in files, hostile ones for the most part, and their answers.
 //
-// NAME.request is what a client sends, byte by byte. NAME.expected is all that comes back, without
-// carriage returns and dates, and then a line that says how the connection ended.
+// NAME.exchange holds what a client sends, the line `-- Answer:`, all that comes back, without
+// carriage returns and dates, and a line that says how the connection ended. Each line of the
+// request is sent with CR LF behind it, but for one that ends with a backslash, which is sent
+// alone. Within a line, \r, \n, \0 and \xNN stand for a byte.
 
 #include "tests/host/http/HttpTest.h"
 
@@ -22,14 +24,50 @@ std::string contentOf(const std::filesystem::path& file)
     return content.str();
 }
 
-std::vector<std::string> requestFiles()
+std::vector<std::string> exchangeNames()
 {
     std::vector<std::string> names;
     for (const auto& entry : std::filesystem::directory_iterator(Folder))
-        if (entry.path().extension() == ".request")
-            names.push_back(entry.path().stem().string());
+        names.push_back(entry.path().stem().string());
     std::sort(names.begin(), names.end());
     return names;
+}
+
+// Returns the byte that the escape at the beginning stands for, and removes the escape.
+char takeEscape(std::string_view& text)
+{
+    const std::string_view digits = text.substr(std::min<std::size_t>(text.size(), 2), 2);
+    const char kind = text.size() > 1 ? text[1] : '\0';
+    text.remove_prefix(std::min<std::size_t>(text.size(), kind == 'x' ? 4 : 2));
+    switch (kind) {
+    case 'r':
+        return '\r';
+    case 'n':
+        return '\n';
+    case '0':
+        return '\0';
+    case 'x':
+        return static_cast<char>(std::stoi(std::string(digits), nullptr, 16));
+    default:
+        throw std::invalid_argument("there is no such escape");
+    }
+}
+
+// Returns the bytes that the lines of a request stand for.
+std::string bytesOf(std::string_view lines)
+{
+    std::string bytes;
+    while (!lines.empty()) {
+        if (lines.starts_with("\\\n")) {
+            lines.remove_prefix(2);
+        } else if (lines.starts_with('\\')) {
+            bytes += takeEscape(lines);
+        } else {
+            bytes += lines.starts_with('\n') ? "\r\n" : std::string(1, lines.front());
+            lines.remove_prefix(1);
+        }
+    }
+    return bytes;
 }
 
 // What the HTTP library refuses by itself, it says in words of its own, some of them twice.
@@ -80,14 +118,18 @@ protected:
 
 TEST_P(RequestFilesTest, OutcomeIsTheExpectedOne)
 {
-    const std::string expected = contentOf(Folder / (GetParam() + ".expected"));
+    const std::string content = contentOf(Folder / (GetParam() + ".exchange"));
+    const std::string separator = "-- Answer:\n";
+    const std::size_t requestEnd = content.find(separator);
+    ASSERT_NE(requestEnd, content.npos);
+    const std::string expected = content.substr(requestEnd + separator.size());
     const std::string end = expected.substr(std::min(expected.rfind("-- "), expected.size()));
     ASSERT_TRUE(end == staysOpen || end == isClosed || end == isClosedThen) << end;
-    EXPECT_EQ(outcome(contentOf(Folder / (GetParam() + ".request")), end), expected);
+    EXPECT_EQ(outcome(bytesOf(content.substr(0, requestEnd)), end), expected);
 }
 
 INSTANTIATE_TEST_SUITE_P(
-    Files, RequestFilesTest, testing::ValuesIn(requestFiles()), [](const auto& file) {
+    Files, RequestFilesTest, testing::ValuesIn(exchangeNames()), [](const auto& file) {
         std::string name = file.param;
         std::replace_if(
             name.begin(), name.end(), [](char c) { return c == '-' || c == '.'; }, '_');

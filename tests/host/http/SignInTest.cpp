@@ -231,8 +231,8 @@ TEST_F(SignInTest, ServerThatStopsDoesNotWaitForThoseWhoGuess)
     HttpClient behind = connect();
     behind.send(post(right));
     EXPECT_FALSE(behind.hasReplyWithin(100ms));
-    server->stopAccepting();
-    EXPECT_TRUE(server->waitUntilQuiet(8s));
+    server->beginShutdown();
+    EXPECT_TRUE(server->waitUntilIdle(8s));
     EXPECT_EQ(guesser.receive().status, 401);
     EXPECT_EQ(behind.receive().body, "the server is ending\n");
     EXPECT_TRUE(guesser.isClosed());

@@ -124,7 +124,7 @@ TEST_F(SoakTest, NothingStaysBehind)
     [[maybe_unused]] const std::size_t before = residentKilobytes();
     soak(duration() / 2);
     EXPECT_GT(operations.calls, 100);
-    EXPECT_TRUE(server->waitUntilQuiet(10s));
+    EXPECT_TRUE(server->waitUntilIdle(10s));
     EXPECT_EQ(operations.answersAlive, 0);
 #ifdef NDEBUG // the sanitizers keep what was freed
     EXPECT_LT(residentKilobytes(), before + 8 * 1024);

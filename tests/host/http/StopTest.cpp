@@ -2,8 +2,7 @@
 
 // How the server ends.
 
-#include "host/http/Timer.h"
-#include "host/http/WorkerPool.h"
+#include "host/http/WorkSlots.h"
 #include "tests/host/http/HttpTest.h"
 #include "tests/support/LogCapture.h"
 
@@ -35,15 +34,15 @@ TEST_F(StopTest, RequestsThatRunComeToTheirEnd)
     HttpClient running = connect();
     running.send(post());
     waitForWork();
-    server->stopAccepting();
-    EXPECT_FALSE(server->waitUntilQuiet(10ms));
+    server->beginShutdown();
+    EXPECT_FALSE(server->waitUntilIdle(10ms));
     EXPECT_THROW(connect(), std::system_error);
     EXPECT_TRUE(idle.isClosed());
     const HttpReply reply = running.receive();
     EXPECT_EQ(reply.status, 200);
     EXPECT_EQ(reply.field("connection"), "close");
     EXPECT_TRUE(running.isClosed());
-    EXPECT_TRUE(server->waitUntilQuiet(5s));
+    EXPECT_TRUE(server->waitUntilIdle(5s));
 }
 
 TEST_F(StopTest, LargeAnswersAreFetchedToTheirEnd)
@@ -53,10 +52,10 @@ TEST_F(StopTest, LargeAnswersAreFetchedToTheirEnd)
     HttpClient client = connect();
     client.send(post());
     ASSERT_TRUE(client.hasReplyWithin(5s));
-    server->stopAccepting();
-    EXPECT_FALSE(server->waitUntilQuiet(100ms));
+    server->beginShutdown();
+    EXPECT_FALSE(server->waitUntilIdle(100ms));
     EXPECT_EQ(client.receive().body.size(), 20'000'000U);
-    EXPECT_TRUE(server->waitUntilQuiet(5s));
+    EXPECT_TRUE(server->waitUntilIdle(5s));
     EXPECT_TRUE(client.isClosed()); // though its head was sent when nobody thought of an end
 }
 
@@ -68,8 +67,8 @@ TEST_F(StopTest, HalfSentRequestsAreNotWaitedForLong)
     HttpClient bodyless = connect();
     bodyless.send(post().substr(0, post().size() - 1));
     EXPECT_EQ(ask(post()).status, 200); // by now the server has seen the others' beginning
-    server->stopAccepting();
-    EXPECT_TRUE(server->waitUntilQuiet(8s));
+    server->beginShutdown();
+    EXPECT_TRUE(server->waitUntilIdle(8s));
     EXPECT_TRUE(headless.isClosed());
     EXPECT_TRUE(bodyless.isClosed());
 }
@@ -80,7 +79,7 @@ TEST_F(StopTest, RequestThatIsComingInIsCarriedOut)
     HttpClient client = connect();
     client.send(post().substr(0, 200));
     EXPECT_EQ(ask(post()).status, 200);
-    server->stopAccepting();
+    server->beginShutdown();
     client.send(post().substr(200));
     EXPECT_EQ(client.receive().status, 200);
     EXPECT_TRUE(client.isClosed());
@@ -99,10 +98,10 @@ TEST(ListeningSocketTest, RefusesWithoutGivingItsDescriptorAway)
 TEST_F(StopTest, ServerWithoutClientsIsQuietAtOnce)
 {
     start();
-    EXPECT_TRUE(server->waitUntilQuiet(0ms));
-    server->stopAccepting();
-    server->stopAccepting();
-    EXPECT_TRUE(server->waitUntilQuiet(0ms));
+    EXPECT_TRUE(server->waitUntilIdle(0ms));
+    server->beginShutdown();
+    server->beginShutdown();
+    EXPECT_TRUE(server->waitUntilIdle(0ms));
 }
 
 TEST_F(StopTest, EndCutsOffWhoeverIsThere)
@@ -133,83 +132,23 @@ TEST_F(StopTest, PortIsFreeForTheNextServer)
     }
 }
 
-TEST(TimerTest, DoesThingsInTheirOrderAndAtTheEndAllThatIsLeft)
+TEST(WorkSlotsTest, ServeThoseWhoWaitAndRefuseMore)
 {
-    std::vector<int> done;
-    {
-        Host::Http::Timer timer;
-        const auto now = std::chrono::steady_clock::now();
-        timer.at(now + 3600s, [&] { done.push_back(4); });
-        timer.at(now + 40ms, [&] { done.push_back(2); });
-        timer.at(now + 20ms, [&] { done.push_back(1); });
-        timer.at(now + 60ms, [&] { done.push_back(3); });
-        std::this_thread::sleep_until(now + 200ms);
-        timer.end();
-        timer.at(now + 3600s, [&] { done.push_back(5); });
-    }
-    EXPECT_EQ(done, (std::vector<int>{1, 2, 3, 4, 5}));
-}
-
-TEST(TimerTest, HurriesWithWhatMayBeSooner)
-{
-    std::vector<int> done;
-    Host::Http::Timer timer;
-    const auto later = std::chrono::steady_clock::now() + 3600s;
-    std::promise<void> last;
-    timer.at(later, [&] { done.push_back(4); });
-    timer.atOrSooner(later, [&] { done.push_back(1); });
-    timer.atOrSooner(later + 1s, [&] { done.push_back(2); });
-    timer.hurry();
-    timer.atOrSooner(later, [&] {
-        done.push_back(3);
-        last.set_value();
-    });
-    EXPECT_EQ(last.get_future().wait_for(10s), std::future_status::ready);
-    timer.end();
-    EXPECT_EQ(done, (std::vector<int>{1, 2, 3, 4}));
-}
-
-TEST(TimerTest, GoesOnWhenSomethingFails)
-{
-    const Testing::LogCapture log(6000);
-    int done = 0;
-    {
-        Host::Http::Timer timer;
-        timer.at({}, [] { throw std::runtime_error("it went wrong"); });
-        timer.at({}, [] { throw 1; });
-        timer.at({}, [&] { ++done; });
-        timer.end();
-        timer.at({}, [] { throw std::runtime_error("it is too late"); });
-    }
-    EXPECT_EQ(done, 1);
-    ASSERT_EQ(log.log().size(), 3U);
-    EXPECT_EQ(log.log()[0].text, "it went wrong");
-    EXPECT_EQ(log.log()[2].text, "it is too late");
-}
-
-TEST(WorkerPoolTest, BoundsThoseWhoWaitAndFinishesThem)
-{
-    std::atomic<int> done{0};
-    std::mutex gate;
-    std::atomic<int> running{0};
-    {
-        Host::Http::WorkerPool pool(2, 3);
-        std::unique_lock closed(gate);
-        const auto job = [&] {
-            ++running;
-            const std::lock_guard open(gate);
-            ++done;
-        };
-        EXPECT_TRUE(pool.take(job));
-        EXPECT_TRUE(pool.take(job));
-        while (running < 2)
-            std::this_thread::yield();
-        for (int i = 0; i < 3; ++i)
-            EXPECT_TRUE(pool.take(job));
-        EXPECT_FALSE(pool.take(job));
-        closed.unlock();
-    }
-    EXPECT_EQ(done, 5);
+    Host::Http::WorkSlots slots(1, 2);
+    auto first = slots.take();
+    std::atomic<int> served = 0;
+    std::atomic<int> refused = 0;
+    std::vector<std::jthread> others;
+    for (int i = 0; i < 3; ++i)
+        others.emplace_back([&] { ++(slots.take() ? served : refused); });
+    while (refused == 0)
+        std::this_thread::yield();
+    EXPECT_EQ(served, 0);
+    first.reset();
+    others.clear();
+    EXPECT_EQ(served, 2);
+    EXPECT_EQ(refused, 1);
+    EXPECT_NE(slots.take(), nullptr);
 }
 
 } // namespace
