@@ -6,8 +6,8 @@
 
 build_packages=(
   g++ cmake ninja-build
-  libcli11-dev libfmt-dev libsensors-dev libspdlog-dev libutfcpp-dev nlohmann-json3-dev
-  libpugixml-dev tao-pegtl-dev
+  libcli11-dev libexpat1-dev libfmt-dev libsensors-dev libspdlog-dev libutfcpp-dev
+  nlohmann-json3-dev tao-pegtl-dev
   libcrypt-dev libgnutls28-dev libmicrohttpd-dev libsystemd-dev
   nettle-dev pkg-config
 )

@@ -1,41 +1,27 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// UTF-8 and the characters that XML can hold.
-
 #pragma once
 
-#include <cstddef>
 #include <string>
 #include <string_view>
 
 namespace Host::CimXml {
 
-struct Character {
-    char32_t code = 0;
-    std::size_t size = 0; // in bytes
-    bool isValid = false;
-};
+inline constexpr std::string_view xmlWhiteSpace = " \t\n\r";
 
-// The first character of the text, which is not empty. Bytes that are no character count as an
-// invalid one of one byte.
-Character firstCharacter(std::string_view text);
-
-// Whether XML 1.0 can hold the character.
-bool isXmlCharacter(char32_t code);
-
-void appendUtf8(std::string& out, char32_t code);
-
-// As the content of an element or an attribute: with the five named entities, U+FFFD for what
-// XML cannot hold and for bytes that are no UTF-8. Clients read a carriage return as the end of a
-// line, since numeric references, which would keep it, are not understood by all of them.
-void appendEscaped(std::string& out, std::string_view text);
-
-// Without the white space of XML at its ends.
-std::string_view trimmed(std::string_view text);
-
-constexpr bool isWhiteSpace(char c)
+// Returns whether the code point is a Char of XML 1.0.
+constexpr bool isXmlCharacter(char32_t code)
 {
-    return c == ' ' || c == '\t' || c == '\n' || c == '\r';
+    if (code < 0x20)
+        return code == '\t' || code == '\n' || code == '\r';
+    const bool isSurrogate = code >= 0xD800 && code <= 0xDFFF;
+    return !isSurrogate && code != 0xFFFE && code != 0xFFFF && code <= 0x10FFFF;
 }
+
+// Appends the text as the content of an element or an attribute: with the five predefined
+// entities, and U+FFFD for what XML cannot hold and for bytes that are no UTF-8. Clients read a
+// carriage return as the end of a line, since not all of them understand the numeric reference
+// that would keep it.
+void appendEscaped(std::string& out, std::string_view text);
 
 } // namespace Host::CimXml

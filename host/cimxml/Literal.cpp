@@ -8,6 +8,8 @@
 #include "host/broker/Types.h"
 #include "host/cimxml/Characters.h"
 #include "host/repository/Words.h"
+#include "platform/text/Trim.h"
+#include "platform/text/Utf8.h"
 
 #include <array>
 #include <charconv>
@@ -84,7 +86,7 @@ std::optional<Value> readCharacter(std::string_view text)
 {
     if (text.empty())
         return std::nullopt;
-    const Character character = firstCharacter(text);
+    const Text::Character character = Text::firstCharacter(text);
     if (!character.isValid || character.size != text.size() || character.code > 0xFFFF)
         return std::nullopt;
     return Value::integer(CMPI_char16, character.code);
@@ -102,7 +104,7 @@ std::optional<Value> readDateTime(Arena& arena, std::string_view text)
 void appendCharacter(std::string& out, char32_t code)
 {
     std::string character;
-    appendUtf8(character, isXmlCharacter(code) ? code : U'\xFFFD');
+    Text::appendUtf8(character, isXmlCharacter(code) ? code : Text::replacementCharacter);
     appendEscaped(out, character);
 }
 
@@ -158,7 +160,7 @@ std::optional<Value> readLiteral(Arena& arena, CMPIType type, std::string_view t
         return Value::text(arena, text);
     if (type == CMPI_char16)
         return readCharacter(text);
-    text = trimmed(text);
+    text = Text::trimmed(text, xmlWhiteSpace);
     if (type == CMPI_boolean)
         return readBoolean(text);
     if (type == CMPI_dateTime)

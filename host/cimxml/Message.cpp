@@ -2,9 +2,7 @@
 
 #include "host/cimxml/Message.h"
 
-#include "host/cimxml/MessageParts.h"
-
-#include <algorithm>
+#include "host/cimxml/PathReader.h"
 
 namespace Host::CimXml {
 
@@ -18,13 +16,13 @@ void requireMajorVersion(
         element.fail(std::string(attribute) + " is not " + std::string(major) + ".x", outcome);
 }
 
-Element messageOf(const Element& root)
+const Element& messageOf(const Element& root)
 {
     if (!root.is("CIM"))
         root.fail("the outermost element must be CIM");
     requireMajorVersion(root, "CIMVERSION", "2", Outcome::unsupportedCimVersion);
     requireMajorVersion(root, "DTDVERSION", "2", Outcome::unsupportedDtdVersion);
-    const Element message = root.child({"MESSAGE", "DECLARATION"});
+    const Element& message = root.child({"MESSAGE", "DECLARATION"});
     if (message.is("DECLARATION"))
         message.fail("declarations are no request", Outcome::requestNotValid);
     requireMajorVersion(message, "PROTOCOLVERSION", "1", Outcome::unsupportedProtocolVersion);
@@ -32,9 +30,9 @@ Element messageOf(const Element& root)
 }
 
 // The single request, which is not looked into when there are several or it is of another kind.
-Element requestOf(const Element& message)
+const Element& requestOf(const Element& message)
 {
-    const Element request = message.child({"SIMPLEREQ", "MULTIREQ", "SIMPLEEXPREQ", "MULTIEXPREQ",
+    const Element& request = message.child({"SIMPLEREQ", "MULTIREQ", "SIMPLEEXPREQ", "MULTIEXPREQ",
         "SIMPLERSP", "MULTIRSP", "SIMPLEEXPRSP", "MULTIEXPRSP", "SIMPLEREQACK"});
     if (request.is("MULTIREQ") || request.is("MULTIEXPREQ"))
         request.fail("several requests in one message", Outcome::multipleRequestsUnsupported);
@@ -45,87 +43,61 @@ Element requestOf(const Element& message)
     return request;
 }
 
-Element onlyCallOf(const Element& request)
+const Element& callOf(const Element& request)
 {
-    std::optional<Element> call;
+    const Element* call = nullptr;
     for (const Element& child : request.children({"CORRELATOR", "IMETHODCALL", "METHODCALL"})) {
         if (child.is("CORRELATOR"))
             continue;
-        if (call)
+        if (call != nullptr)
             child.fail("a second call");
-        call = child;
+        call = &child;
     }
-    if (!call)
+    if (call == nullptr)
         request.fail("it holds no call");
     return *call;
 }
 
-} // namespace
-
-Element callOf(const Document& document)
+const Element& pathOf(const Element& call)
 {
-    return onlyCallOf(document.root().child({"MESSAGE"}).child({"SIMPLEREQ"}));
-}
-
-Element pathOf(const Element& call)
-{
-    std::optional<Element> path;
+    const Element* path = nullptr;
     for (const Element& child : call.children()) {
         const bool isPath = call.is("IMETHODCALL")
                                 ? child.is("LOCALNAMESPACEPATH")
                                 : child.is("LOCALCLASSPATH") || child.is("LOCALINSTANCEPATH");
         if (!isPath)
             continue;
-        if (path)
+        if (path != nullptr)
             child.fail("a second path");
-        path = child;
+        path = &child;
     }
-    if (!path)
+    if (path == nullptr)
         call.fail("it says nowhere which namespace or object it is for");
     return *path;
 }
 
-std::string nameSpaceOf(const Element& localNameSpacePath)
-{
-    std::string all;
-    for (const Element& part : localNameSpacePath.children({"NAMESPACE"})) {
-        // Some clients write a path of several names into one.
-        std::string_view rest = part.attribute("NAME");
-        while (!rest.empty()) {
-            const std::string_view name = rest.substr(0, rest.find('/'));
-            if (!name.empty())
-                all.append(all.empty() ? "" : "/").append(name);
-            rest.remove_prefix(std::min(name.size() + 1, rest.size()));
-        }
-    }
-    if (all.empty())
-        localNameSpacePath.fail("it names no namespace");
-    return all;
-}
+} // namespace
 
 Message::Message(std::string_view body, std::size_t maximumDepth)
-    : document_(std::make_unique<const Document>(body, maximumDepth)), size_(body.size())
+    : root_(readDocument(body, maximumDepth)), size_(body.size())
 {
-    const Element message = messageOf(document_->root());
+    const Element& message = messageOf(root_);
     id_ = message.attribute("ID");
     protocolVersion_ = message.attribute("PROTOCOLVERSION");
-    const Element call = onlyCallOf(requestOf(message));
-    methodName_ = call.attribute("NAME");
-    isIntrinsic_ = call.is("IMETHODCALL");
-    const Element path = pathOf(call);
+    call_ = &callOf(requestOf(message));
+    methodName_ = call_->attribute("NAME");
+    isIntrinsic_ = call_->is("IMETHODCALL");
+    path_ = &pathOf(*call_);
     if (isIntrinsic_) {
-        nameSpace_ = nameSpaceOf(path);
+        nameSpace_ = nameSpaceOf(*path_);
         return;
     }
-    for (const Element& child : path.children({"LOCALNAMESPACEPATH", "CLASSNAME", "INSTANCENAME"}))
+    for (const Element& child :
+        path_->children({"LOCALNAMESPACEPATH", "CLASSNAME", "INSTANCENAME"}))
         if (child.is("LOCALNAMESPACEPATH"))
             nameSpace_ = nameSpaceOf(child);
     if (nameSpace_.empty())
-        path.fail("it holds no LOCALNAMESPACEPATH");
+        path_->fail("it holds no LOCALNAMESPACEPATH");
 }
-
-Message::~Message() = default;
-Message::Message(Message&&) noexcept = default;
-Message& Message::operator=(Message&&) noexcept = default;
 
 } // namespace Host::CimXml

@@ -1,37 +1,28 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// A request's body as a message: whom it is for, and what its answer must repeat.
-
 #pragma once
 
-#include "host/cimxml/WellFormed.h"
+#include "host/cimxml/Element.h"
 
 #include <cstddef>
-#include <memory>
 #include <string>
 #include <string_view>
 
 namespace Host::CimXml {
 
-class Document;
-
-// One call of an operation. Immutable; may be read from any thread. The size of the body is the
-// caller's to bound.
+// The MESSAGE in a request's body (DSP0201), with a simple request of one call. Immutable; may be
+// read from any thread. The caller bounds the size of the body.
 class Message {
 public:
-    // Throws RequestError for what is no such call, with the outcome to answer. Elements may stand
-    // so deep in one another.
-    explicit Message(std::string_view body, std::size_t maximumDepth = usualDepth);
-    ~Message();
-    Message(Message&&) noexcept;
-    Message& operator=(Message&&) noexcept;
+    // Throws RequestError for a body that is no such message.
+    explicit Message(std::string_view body, std::size_t maximumDepth = defaultMaximumDepth);
 
-    // What the client calls the message.
+    // The attributes ID and PROTOCOLVERSION, which the response repeats.
     const std::string& id() const noexcept { return id_; }
     const std::string& protocolVersion() const noexcept { return protocolVersion_; }
-    // The operation, or the method of a class, as the client spells it.
+    // The name of the intrinsic or extrinsic method, as the client spells it.
     const std::string& methodName() const noexcept { return methodName_; }
-    // An operation of the protocol itself and no method of a class.
+    // Whether the method is one of the protocol itself (DSP0200) and not of a class.
     bool isIntrinsic() const noexcept { return isIntrinsic_; }
     // Such as root/cimv2, as the client spells it.
     const std::string& nameSpace() const noexcept { return nameSpace_; }
@@ -39,16 +30,22 @@ public:
     // Of the body, in bytes.
     std::size_t size() const noexcept { return size_; }
 
-    // For the readers of this room.
-    const Document& document() const noexcept { return *document_; }
+    // The IMETHODCALL or METHODCALL.
+    const Element& call() const noexcept { return *call_; }
+    // The LOCALNAMESPACEPATH of an IMETHODCALL; the LOCALCLASSPATH or LOCALINSTANCEPATH of a
+    // METHODCALL.
+    const Element& path() const noexcept { return *path_; }
 
 private:
-    std::unique_ptr<const Document> document_;
+    Element root_;
+    // Within the root, on the heap: they stay where they are when the message is moved.
+    const Element* call_;
+    const Element* path_;
     std::size_t size_;
     std::string id_;
     std::string protocolVersion_;
     std::string methodName_;
-    bool isIntrinsic_ = true;
+    bool isIntrinsic_;
     std::string nameSpace_;
 };
 

@@ -6,7 +6,6 @@
 #include "host/cimxml/InvalidParameter.h"
 #include "host/cimxml/Literal.h"
 #include "host/cimxml/Message.h"
-#include "host/cimxml/MessageParts.h"
 #include "host/cimxml/OperationTable.h"
 #include "host/cimxml/PathReader.h"
 #include "host/repository/MofError.h"
@@ -34,30 +33,30 @@ public:
             if (child.is("IPARAMVALUE"))
                 add(child);
         for (std::size_t at = 0; at < parameterCount; ++at)
-            if (form.required.has(static_cast<P>(at)) && !values_[at])
+            if (form.required.has(static_cast<P>(at)) && values_[at] == nullptr)
                 refuse(std::string(form.name) + " needs " + described(static_cast<P>(at)));
     }
 
-    // Nothing when it was not given, or without a value.
-    const std::optional<Element>& operator[](P parameter) const
+    // Null when it was not given, or without a value.
+    const Element* operator[](P parameter) const
     {
         return values_[static_cast<std::size_t>(parameter)];
     }
 
     // The same; throws when it is of another kind.
-    std::optional<Element> get(P parameter, std::string_view kind) const
+    const Element* get(P parameter, std::string_view kind) const
     {
-        const std::optional<Element>& value = (*this)[parameter];
-        if (value && !value->is(kind))
+        const Element* const value = (*this)[parameter];
+        if (value != nullptr && !value->is(kind))
             refuse(described(parameter) + " must be a " + std::string(kind) + ", not a " +
-                   std::string(value->name()));
+                   value->name());
         return value;
     }
 
     std::string text(P parameter) const
     {
-        const auto value = get(parameter, "VALUE");
-        return value ? value->content() : std::string();
+        const Element* const value = get(parameter, "VALUE");
+        return value != nullptr ? value->content() : std::string();
     }
 
     bool flag(P parameter) const
@@ -76,8 +75,8 @@ public:
     // An empty list is one, and other than none.
     std::optional<std::vector<std::string>> texts(P parameter) const
     {
-        const auto value = get(parameter, "VALUE.ARRAY");
-        if (!value)
+        const Element* const value = get(parameter, "VALUE.ARRAY");
+        if (value == nullptr)
             return std::nullopt;
         std::vector<std::string> all;
         for (const Element& each : value->children({"VALUE"}))
@@ -102,16 +101,17 @@ private:
         values_[at] = element.findChild({"VALUE", "VALUE.ARRAY", "VALUE.REFERENCE", "INSTANCENAME",
             "CLASSNAME", "QUALIFIER.DECLARATION", "CLASS", "INSTANCE", "VALUE.NAMEDINSTANCE"});
         // Some clients name no class by an empty name.
-        if (values_[at] && values_[at]->is("CLASSNAME") && values_[at]->attribute("NAME").empty())
-            values_[at] = std::nullopt;
+        if (values_[at] != nullptr && values_[at]->is("CLASSNAME") &&
+            values_[at]->attribute("NAME").empty())
+            values_[at] = nullptr;
     }
 
     std::optional<Value> literal(P parameter, CMPIType type) const
     {
-        const auto value = get(parameter, "VALUE");
-        if (!value)
+        const Element* const value = get(parameter, "VALUE");
+        if (value == nullptr)
             return std::nullopt;
-        const std::string content = value->content();
+        const std::string& content = value->content();
         const auto read = readLiteral(Arena::required(), type, content);
         if (!read)
             refuse(described(parameter) + ": " + quotation(content) + " is no value of type " +
@@ -121,7 +121,7 @@ private:
 
     const OperationForm& form_;
     std::array<bool, parameterCount> isGiven_{};
-    std::array<std::optional<Element>, parameterCount> values_;
+    std::array<const Element*, parameterCount> values_{};
 };
 
 class OperationReader {
@@ -165,8 +165,8 @@ private:
 
     std::string className(P parameter) const
     {
-        const auto value = parameters_.get(parameter, "CLASSNAME");
-        return value ? paths_.className(*value, operation_.nameSpace) : std::string();
+        const Element* const value = parameters_.get(parameter, "CLASSNAME");
+        return value != nullptr ? paths_.className(*value, operation_.nameSpace) : std::string();
     }
 
     void readClasses()
@@ -178,13 +178,14 @@ private:
 
     void readPath()
     {
-        const std::optional<Element>& object = parameters_[P::objectName];
-        if (object && object->is("CLASSNAME")) {
+        const Element* const object = parameters_[P::objectName];
+        if (object != nullptr && object->is("CLASSNAME")) {
             operation_.className = className(P::objectName);
             return;
         }
-        const auto name = parameters_.get(object ? P::objectName : P::instanceName, "INSTANCENAME");
-        if (!name)
+        const Element* const name =
+            parameters_.get(object != nullptr ? P::objectName : P::instanceName, "INSTANCENAME");
+        if (name == nullptr)
             return;
         operation_.path = &paths_.instanceName(*name, operation_.nameSpace);
         operation_.className = operation_.path->className();
@@ -198,7 +199,7 @@ private:
 // No class has a method that can be called: neither the path's keys nor the arguments are read.
 [[noreturn]] void refuseMethod(const Message& message, const PathReader& paths)
 {
-    const Element path = pathOf(callOf(message.document()));
+    const Element& path = message.path();
     std::string className;
     for (const Element& part : path.children({"LOCALNAMESPACEPATH", "INSTANCENAME", "CLASSNAME"}))
         if (!part.is("LOCALNAMESPACEPATH"))
@@ -226,7 +227,7 @@ Operation readOperation(const Message& message, const Repository& classes)
     Operation operation;
     operation.kind = form->kind;
     operation.nameSpace = nameSpace->name();
-    OperationReader(classes, Parameters(*form, callOf(message.document())), operation).read();
+    OperationReader(classes, Parameters(*form, message.call()), operation).read();
     return operation;
 }
 

@@ -7,13 +7,18 @@
 #include "host/broker/Refusal.h"
 #include "host/cimxml/InvalidParameter.h"
 #include "host/cimxml/Literal.h"
-#include "host/cimxml/MessageParts.h"
 #include "host/repository/MofError.h"
 #include "host/repository/Words.h"
+
+#include <algorithm>
 
 namespace Host::CimXml {
 
 namespace {
+
+// Keys of an object whose class is not known. Those of others are bounded by what the class has;
+// each is held against all before it.
+constexpr std::size_t maximumUndeclared = 1000;
 
 // The type a KEYVALUE itself names; CMPI_null for a number of any type.
 CMPIType namedType(const Element& element, const std::string& what)
@@ -47,6 +52,24 @@ const std::string& onlyKeyOf(const ClassDeclaration* declared, const ObjectPath&
 }
 
 } // namespace
+
+std::string nameSpaceOf(const Element& localNameSpacePath)
+{
+    std::string all;
+    for (const Element& part : localNameSpacePath.children({"NAMESPACE"})) {
+        // Some clients write a path of several names into one.
+        std::string_view rest = part.attribute("NAME");
+        while (!rest.empty()) {
+            const std::string_view name = rest.substr(0, rest.find('/'));
+            if (!name.empty())
+                all.append(all.empty() ? "" : "/").append(name);
+            rest.remove_prefix(std::min(name.size() + 1, rest.size()));
+        }
+    }
+    if (all.empty())
+        localNameSpacePath.fail("it names no namespace");
+    return all;
+}
 
 const ObjectPath& PathReader::instanceName(const Element& element, std::string_view nameSpace) const
 {
@@ -89,7 +112,7 @@ ObjectPath& PathReader::instance(
     if (depth > Value::maximumNesting)
         refuse("paths more than " + std::to_string(Value::maximumNesting) + " deep in one another");
     ObjectPath& path = emptyPath(element, "CLASSNAME", nameSpace);
-    const std::vector<Element> keys =
+    const std::vector<Element>& keys =
         element.children({"KEYBINDING", "KEYVALUE", "VALUE.REFERENCE"});
     if (keys.size() > maximumUndeclared && declaredClass(path) == nullptr)
         refuse("more than " + std::to_string(maximumUndeclared) + " keys of class " +
@@ -110,7 +133,7 @@ ObjectPath& PathReader::instance(
 ObjectPath& PathReader::target(
     const Element& element, std::string_view nameSpace, unsigned depth) const
 {
-    const Element found = element.child({"INSTANCENAME", "LOCALINSTANCEPATH", "INSTANCEPATH",
+    const Element& found = element.child({"INSTANCENAME", "LOCALINSTANCEPATH", "INSTANCEPATH",
         "CLASSNAME", "LOCALCLASSPATH", "CLASSPATH"});
     const auto named = [&](const Element& name, std::string_view where) -> ObjectPath& {
         return name.is("CLASSNAME") ? emptyPath(name, "NAME", where) : instance(name, where, depth);
@@ -119,7 +142,7 @@ ObjectPath& PathReader::target(
         return named(found, nameSpace);
     std::string host;
     std::string ownNameSpace;
-    std::optional<Element> name;
+    const Element* name = nullptr;
     for (const Element& part :
         found.children({"NAMESPACEPATH", "LOCALNAMESPACEPATH", "INSTANCENAME", "CLASSNAME"})) {
         if (part.is("NAMESPACEPATH")) {
@@ -129,10 +152,10 @@ ObjectPath& PathReader::target(
         } else if (part.is("LOCALNAMESPACEPATH")) {
             ownNameSpace = nameSpaceOf(part);
         } else {
-            name = part;
+            name = &part;
         }
     }
-    if (!name || ownNameSpace.empty())
+    if (name == nullptr || ownNameSpace.empty())
         found.fail("it needs a namespace and a name");
     ObjectPath& path = named(*name, ownNameSpace);
     if (!host.empty())

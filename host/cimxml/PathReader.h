@@ -9,9 +9,14 @@
 #include "host/cimxml/Element.h"
 #include "host/repository/Repository.h"
 
+#include <string>
 #include <string_view>
 
 namespace Host::CimXml {
+
+// Returns the names in a LOCALNAMESPACEPATH with slashes between them. Throws RequestError when
+// there are none.
+std::string nameSpaceOf(const Element& localNameSpacePath);
 
 // Names of namespaces, classes and keys come out as they are declared, and keys are of the types
 // the class declares. Where the class is not known the client's spelling stays, and VALUETYPE or

@@ -2,19 +2,7 @@
 
 #include "host/cimxml/RequestError.h"
 
-#include <algorithm>
-
 namespace Host::CimXml {
-
-namespace {
-
-std::size_t lineOf(std::string_view text, std::size_t offset)
-{
-    const std::string_view before = text.substr(0, offset);
-    return 1 + static_cast<std::size_t>(std::count(before.begin(), before.end(), '\n'));
-}
-
-} // namespace
 
 std::string_view nameOf(Outcome outcome)
 {
@@ -40,16 +28,10 @@ std::string_view nameOf(Outcome outcome)
 }
 
 RequestError::RequestError(
-    Outcome outcome, std::string_view text, std::size_t offset, std::string_view why)
-    : RequestError(outcome, offset, lineOf(text, offset), std::string(why))
-{
-}
-
-RequestError::RequestError(
-    Outcome outcome, std::size_t offset, std::size_t line, const std::string& why)
+    Outcome outcome, std::size_t line, std::size_t offset, const std::string& why)
     : std::runtime_error(
           "line " + std::to_string(line) + ", byte " + std::to_string(offset) + ": " + why),
-      outcome_(outcome), offset_(offset), line_(line)
+      outcome_(outcome), line_(line), offset_(offset)
 {
 }
 

@@ -29,19 +29,16 @@ std::string_view nameOf(Outcome outcome);
 // what() reads `line N, byte M: reason`.
 class RequestError : public std::runtime_error {
 public:
-    // The offset is a place in the text.
-    RequestError(Outcome outcome, std::string_view text, std::size_t offset, std::string_view why);
+    RequestError(Outcome outcome, std::size_t line, std::size_t offset, const std::string& why);
 
     Outcome outcome() const noexcept { return outcome_; }
-    std::size_t offset() const noexcept { return offset_; } // bytes before the place
     std::size_t line() const noexcept { return line_; }     // counts from 1
+    std::size_t offset() const noexcept { return offset_; } // bytes before the place
 
 private:
-    RequestError(Outcome outcome, std::size_t offset, std::size_t line, const std::string& why);
-
     Outcome outcome_;
-    std::size_t offset_;
     std::size_t line_;
+    std::size_t offset_;
 };
 
 } // namespace Host::CimXml

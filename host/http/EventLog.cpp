@@ -2,8 +2,8 @@
 
 #include "host/http/EventLog.h"
 
-#include "host/cimxml/Characters.h"
 #include "platform/logging/RynLogger.h"
+#include "platform/text/Utf8.h"
 
 #include <algorithm>
 #include <array>
@@ -52,7 +52,7 @@ std::string legible(std::string_view text)
 {
     std::string line;
     while (!text.empty()) {
-        const auto next = CimXml::firstCharacter(text);
+        const auto next = Text::firstCharacter(text);
         if (!next.isValid)
             appendNumber(line, "<0x%02X>", static_cast<unsigned char>(text.front()));
         else if (isUnseen(next.code))
