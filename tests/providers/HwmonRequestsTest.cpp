@@ -66,7 +66,7 @@ private:
 
 TEST_F(HwmonRequests, eightThreadsEnumerateTrueReadingsWhileChipsComeAndGo)
 {
-    BoundSysfs sysfs(Testing::sysfsTree("hotplug"));
+    BoundSysfs sysfs("hotplug");
     const auto whole = readings();
     ASSERT_EQ(whole.size(), 3U);
     std::atomic<bool> goOn{true};
@@ -99,7 +99,7 @@ TEST_F(HwmonRequests, eightThreadsEnumerateTrueReadingsWhileChipsComeAndGo)
 
 TEST_F(HwmonRequests, aChipThatIsGoneIsNotInTheNextAnswer)
 {
-    BoundSysfs sysfs(Testing::sysfsTree("hotplug"));
+    BoundSysfs sysfs("hotplug");
     ASSERT_EQ(readings().size(), 3U);
     sysfs.rename(chip, "unplugged");
     const auto rest = readings();

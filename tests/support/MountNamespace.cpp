@@ -9,7 +9,6 @@
 #include <cstdio>
 #include <cstdlib>
 #include <fstream>
-#include <iterator>
 #include <stdexcept>
 #include <system_error>
 #include <vector>
@@ -79,38 +78,32 @@ void writeFile(const fs::path& path, const std::string& text)
         throw std::runtime_error("cannot write " + path.string());
 }
 
-std::string contentOf(const fs::path& path)
+void layOut(const fs::path& folder, const std::string& machine)
 {
-    std::ifstream file(path);
-    return {std::istreambuf_iterator<char>(file), {}};
+    const fs::path manifest =
+        fs::path(SENSOR_PROFILE_SOURCE_DIR) / "tests/data/sysfs" / (machine + ".txt");
+    std::ifstream lines(manifest);
+    for (std::string line; std::getline(lines, line);) {
+        const std::size_t blank = line.find(' ');
+        const fs::path path = folder / line.substr(0, blank);
+        const std::string content = line.substr(blank + 1);
+        fs::create_directories(path.parent_path());
+        if (content.starts_with("-> "))
+            fs::create_symlink(content.substr(3), path);
+        else
+            writeFile(path, content + '\n');
+    }
+    if (!lines.eof())
+        throw std::runtime_error("cannot read " + manifest.string());
 }
 
-// A kept tree has no symbolic links, which not every checkout and archive preserves: the files
-// that the kernel shows as links hold the name of their target.
-void makeLinks(const fs::path& folder)
+// Members are initialised in their order, so the tree is complete before it is bound.
+const fs::path& filled(const fs::path& folder, const std::string& machine)
 {
-    std::vector<fs::path> links;
-    for (const fs::directory_entry& entry : fs::recursive_directory_iterator(folder)) {
-        const fs::path name = entry.path().filename();
-        if (entry.is_regular_file() && (name == "device" || name == "subsystem"))
-            links.push_back(entry.path());
-    }
-    for (const fs::path& link : links) {
-        const std::string target = contentOf(link);
-        fs::remove(link);
-        fs::create_symlink(target, link);
-    }
-}
-
-// The copy must stand before it is bound, since members are built in order.
-const fs::path& filled(const fs::path& folder, const fs::path& tree)
-{
-    if (tree.empty()) {
+    if (machine.empty())
         fs::create_directories(folder / "hwmon");
-    } else {
-        fs::copy(tree, folder, fs::copy_options::recursive);
-        makeLinks(folder);
-    }
+    else
+        layOut(folder, machine);
     return folder;
 }
 
@@ -148,12 +141,10 @@ BindMount::~BindMount()
     umount2(over_.c_str(), MNT_DETACH);
 }
 
-fs::path sysfsTree(const std::string& name)
+BoundSysfs::BoundSysfs(const std::string& machine)
+    : mount_(filled(tree_.path(), machine), "/sys/class")
 {
-    return fs::path(SENSOR_PROFILE_SOURCE_DIR) / "tests/data/sysfs" / name;
 }
-
-BoundSysfs::BoundSysfs(const fs::path& tree) : mount_(filled(copy_.path(), tree), "/sys/class") {}
 
 void BoundSysfs::write(const std::string& relative, const std::string& text)
 {

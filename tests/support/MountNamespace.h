@@ -37,20 +37,19 @@ private:
     std::filesystem::path over_;
 };
 
-// A captured machine's tree among the test data, such as "server".
-std::filesystem::path sysfsTree(const std::string& name);
-
-// A private copy of a tree, bound over /sys/class. The tree holds `hwmon/hwmonN/...`, whose
-// `device` links lead to `../../devices/<address>`, where a `subsystem` link names the bus. An
-// empty path gives an empty tree.
+// The sysfs tree of a machine, laid out in a temporary folder and bound over /sys/class. The tree
+// holds `hwmon/hwmonN/...`, whose `device` links lead to `../../devices/<address>`, where a
+// `subsystem` link names the bus.
 class BoundSysfs {
 public:
-    explicit BoundSysfs(const std::filesystem::path& tree);
+    // Reads tests/data/sysfs/<machine>.txt, which has a line for each file (`PATH CONTENT`) and
+    // for each symbolic link (`PATH -> TARGET`). An empty name gives an empty tree.
+    explicit BoundSysfs(const std::string& machine);
 
     // Paths are relative to the tree, such as "hwmon/hwmon0/temp1_input".
     std::filesystem::path path(const std::string& relative) const
     {
-        return copy_.path() / relative;
+        return tree_.path() / relative;
     }
     void write(const std::string& relative, const std::string& text);
     void remove(const std::string& relative);
@@ -61,7 +60,7 @@ public:
         const std::string& address);
 
 private:
-    TemporaryFolder copy_;
+    TemporaryFolder tree_;
     BindMount mount_;
 };
 

@@ -103,17 +103,11 @@ void expectSame(const json& properties, const Channel& channel)
     expectSame(properties, "UpperThresholdFatal", channel, "emergency");
 }
 
-class HwmonTest : public MountNamespaceTest, public testing::WithParamInterface<const char*> {
-protected:
-    static std::string tree()
-    {
-        return Testing::sysfsTree(GetParam()).string();
-    }
-};
+class HwmonTest : public MountNamespaceTest, public testing::WithParamInterface<const char*> {};
 
 TEST_P(HwmonTest, ListShowsWhatTheSensorsProgramReads)
 {
-    const BoundSysfs sysfs(tree());
+    const BoundSysfs sysfs(GetParam());
     const auto theirs = channels();
     const auto ours = listedSensors();
     ASSERT_FALSE(theirs.empty());
@@ -133,7 +127,7 @@ TEST_P(HwmonTest, RecordReplaysToTheSameOutput)
 {
     const TemporaryFolder folder;
     const std::string file = (folder.path() / "record.json").string();
-    const BoundSysfs sysfs(tree());
+    const BoundSysfs sysfs(GetParam());
     ASSERT_EQ(run({"record", "-o", file}).code, 0);
     EXPECT_EQ(run({"list", "--json", "--model", file}).out, run({"list", "--json"}).out);
     EXPECT_EQ(run({"list", "--model", file}).out, run({"list"}).out);
@@ -154,7 +148,7 @@ TEST_F(HwmonAbsentTest, MachineWithoutChipsIsSaid)
 
 TEST_F(HwmonAbsentTest, SensorsConfigurationIsHonoured)
 {
-    const BoundSysfs sysfs(Testing::sysfsTree("desktop"));
+    const BoundSysfs sysfs("desktop");
     const BoundSensorsConfiguration configuration(
         "chip \"nct6798-*\"\n  label fan1 \"Front fan\"\n  ignore fan2\n");
     const auto sensors = listedSensors();

@@ -104,7 +104,7 @@ protected:
             return;
         // It lasts long enough to run beside all other tests without being in their way.
         EXPECT_NE(::nice(10), -1);
-        sysfs_ = std::make_unique<BoundSysfs>(Testing::sysfsTree("hotplug"));
+        sysfs_ = std::make_unique<BoundSysfs>("hotplug");
         // Else the address sanitizer keeps what was freed, up to 256 MB.
         server_ = std::make_unique<ServerProcess>(std::vector<std::string>{"--workers", "4"},
             std::map<std::string, std::string>{

@@ -64,7 +64,7 @@ public:
         const auto& [machine, scheme] = place;
         std::vector<std::string> options = optionsOf(machine);
         if (options.empty() && !sysfs_)
-            sysfs_.emplace(sysfsTree(machine));
+            sysfs_.emplace(machine);
         if (scheme == "https") {
             const auto more = encryption_.options();
             options.insert(options.end(), more.begin(), more.end());

@@ -40,7 +40,7 @@ std::vector<std::string> paths()
 
 TEST_F(HwmonChange, aChipThatVanishedOrCameBackShowsAtTheNextRequest)
 {
-    BoundSysfs sysfs(Testing::sysfsTree("hotplug"));
+    BoundSysfs sysfs("hotplug");
     const auto before = paths();
     EXPECT_THAT(before, ElementsAre("/hwmon/coretemp-isa-0000/temp1",
                             "/hwmon/drivetemp-scsi-2-0/temp1", "/hwmon/nvme-pci-0200/temp1"));
@@ -53,7 +53,7 @@ TEST_F(HwmonChange, aChipThatVanishedOrCameBackShowsAtTheNextRequest)
 
 TEST_F(HwmonChange, aChipThatTookAnothersPlaceIsTakenForWhatItIs)
 {
-    BoundSysfs sysfs(Testing::sysfsTree("hotplug"));
+    BoundSysfs sysfs("hotplug");
     walk();
     sysfs.write(std::string(nvme) + "/name", "other\n");
     EXPECT_THAT(paths(), testing::Contains("/hwmon/other-pci-0200/temp1"));
@@ -69,7 +69,7 @@ TEST_F(HwmonChange, anAttributeThatADriverAddsShowsAtTheNextRequest)
 
 TEST_F(HwmonChange, aListedNodeWhoseChipVanishedIsLost)
 {
-    BoundSysfs sysfs(Testing::sysfsTree("hotplug"));
+    BoundSysfs sysfs("hotplug");
     Vorn::HwmonSource source;
     const auto nodes = source.nodes(NodeType::Temperature);
     ASSERT_THAT(nodes, SizeIs(3));
@@ -84,7 +84,7 @@ TEST_F(HwmonChange, aListedNodeWhoseChipVanishedIsLost)
 
 TEST_F(HwmonChange, aListedNodeOutlivesChangesElsewhere)
 {
-    BoundSysfs sysfs(Testing::sysfsTree("hotplug"));
+    BoundSysfs sysfs("hotplug");
     Vorn::HwmonSource source;
     const auto nodes = source.nodes(NodeType::Temperature);
     sysfs.remove("hwmon/hwmon0");
@@ -95,7 +95,7 @@ TEST_F(HwmonChange, aListedNodeOutlivesChangesElsewhere)
 
 TEST_F(HwmonChange, nodesOfEarlierListingsCanBeRead)
 {
-    const BoundSysfs sysfs(Testing::sysfsTree("server"));
+    const BoundSysfs sysfs("server");
     Vorn::HwmonSource source;
     const auto temperatures = source.nodes(NodeType::Temperature);
     const auto fans = source.nodes(NodeType::Tachometer);
@@ -115,7 +115,7 @@ TEST_F(HwmonChange, aChangedConfigurationHoldsAtTheNextRequest)
 
 TEST_F(HwmonChange, twoCursorsOnOneThreadDoNotBlockEachOther)
 {
-    BoundSysfs sysfs(Testing::sysfsTree("hotplug"));
+    BoundSysfs sysfs("hotplug");
     Vorn::Instrumentation first;
     first.selectNode(NodeType::Temperature);
     sysfs.remove(nvme);
@@ -128,7 +128,7 @@ TEST_F(HwmonChange, twoCursorsOnOneThreadDoNotBlockEachOther)
 TEST_F(HwmonChange, aRecordedMachineReplaysToTheSameNodes)
 {
     for (const std::string tree : {"desktop", "server", "hotplug"}) {
-        const BoundSysfs sysfs(Testing::sysfsTree(tree));
+        const BoundSysfs sysfs(tree);
         const auto nodes = walk();
         const auto recorded = Vorn::readModel(Vorn::recordModel());
         ASSERT_EQ(recorded.size(), nodes.size());
@@ -154,7 +154,7 @@ std::optional<double> expectedReading(const Testing::SeenNode& node)
 
 TEST_F(HwmonChange, eightThreadsReadWhileChipsComeAndGo)
 {
-    BoundSysfs sysfs(Testing::sysfsTree("hotplug"));
+    BoundSysfs sysfs("hotplug");
     std::atomic<bool> goOn{true};
     std::atomic<unsigned> walks{0};
     std::vector<std::jthread> readers;

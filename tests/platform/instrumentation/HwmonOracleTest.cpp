@@ -128,7 +128,7 @@ void expectSameMachine()
 
 TEST_P(Oracle, agreesOnEveryReadingLimitAndLabel)
 {
-    const BoundSysfs sysfs(Testing::sysfsTree(GetParam()));
+    const BoundSysfs sysfs(GetParam());
     expectSameMachine();
 }
 
@@ -141,7 +141,7 @@ TEST_P(Oracle, agreesUnderAConfigurationOfTheAdministrator)
                           "  compute in0 @*(1+10/3.3), @/(1+10/3.3)\n"
                           "  ignore temp2\n"
                           "  ignore fan2\n");
-    const BoundSysfs sysfs(Testing::sysfsTree(GetParam()));
+    const BoundSysfs sysfs(GetParam());
     expectSameMachine();
 }
 

@@ -25,7 +25,7 @@ std::map<std::string, unsigned> statusesBesideNormal()
 
 TEST_F(HwmonTrees, aDesktopBoardShowsItsUnconnectedInputs)
 {
-    const BoundSysfs sysfs(Testing::sysfsTree("desktop"));
+    const BoundSysfs sysfs("desktop");
     EXPECT_EQ(statusesBesideNormal(), (std::map<std::string, unsigned>{
                                           {"/hwmon/amdgpu-pci-0b00/fan1", 16},
                                           {"/hwmon/nct6798-isa-0290/fan5", 22},
@@ -40,7 +40,7 @@ TEST_F(HwmonTrees, aDesktopBoardShowsItsUnconnectedInputs)
 
 TEST_F(HwmonTrees, aServerShowsWhatIsHotFailedDisabledAndLost)
 {
-    const BoundSysfs sysfs(Testing::sysfsTree("server"));
+    const BoundSysfs sysfs("server");
     EXPECT_EQ(statusesBesideNormal(), (std::map<std::string, unsigned>{
                                           {"/hwmon/coretemp-isa-0001/temp1", 23},
                                           {"/hwmon/coretemp-isa-0001/temp2", 23},
