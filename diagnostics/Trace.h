@@ -22,20 +22,18 @@ namespace Vorn {
 enum MessageType : int { Entering = 0, Exiting = 1, Method = 2, Message = 3 };
 
 // Importance of trace lines, as the logging library's filter takes it.
-enum TraceLevel : int { MarkWithParameters = 3000, Mark = 4000, Failure = 6000 };
+enum TraceLevel : int { markWithParametersLevel = 3000, markLevel = 4000, failureLevel = 6000 };
 
 // A line is cut to one character less than this.
-inline constexpr std::size_t TraceBufferSize = 512;
-using TraceBuffer = std::array<char, TraceBufferSize>;
+inline constexpr std::size_t traceBufferSize = 512;
+using TraceBuffer = std::array<char, traceBufferSize>;
 
 namespace detail {
 
-// How the lines of one MessageType read; `parameters` is null for a line without.
+// Formats a line of the type; the parameter list and its label are empty in a line without one.
 inline char* format(TraceBuffer& buffer, const char* text, const char* file, unsigned line,
-    const char* parameters, MessageType type)
+    const char* label, const char* list, MessageType type)
 {
-    const char* const label = parameters ? ",Parameters List: " : "";
-    const char* const list = parameters ? parameters : "";
     buffer.fill('\0');
     switch (type) {
     case Method:
@@ -66,7 +64,7 @@ inline char* format(TraceBuffer& buffer, const char* text, const char* file, uns
 inline char* trace(const char* text, const char* file, unsigned line, MessageType type)
 {
     static thread_local TraceBuffer buffer;
-    return detail::format(buffer, text, file, line, nullptr, type);
+    return detail::format(buffer, text, file, line, "", "", type);
 }
 
 // The same with a parameter list, in a buffer of its own.
@@ -74,7 +72,8 @@ inline char* tracepara(
     const char* text, const char* file, unsigned line, const char* parameters, MessageType type)
 {
     static thread_local TraceBuffer buffer;
-    return detail::format(buffer, text, file, line, parameters, type);
+    return detail::format(
+        buffer, text, file, line, ",Parameters List: ", parameters ? parameters : "(null)", type);
 }
 
 // Where a trace point stands, as the logging library is told.
@@ -102,7 +101,14 @@ void emit(const TraceLocation& at, const std::string& component, int level, cons
 
 namespace detail {
 
-inline constexpr const char* TraceFile = "Trace";
+inline constexpr const char* traceFile = "Trace";
+
+// The line numbers in the marks. Monitoring scripts match them, so they are an interface: they do
+// not follow the source.
+inline constexpr unsigned entrySeparatorLine = 336;
+inline constexpr unsigned enteringLine = 337;
+inline constexpr unsigned exitingLine = 348;
+inline constexpr unsigned exitSeparatorLine = 349;
 
 // 78 equals signs set one request's lines apart from the next one's.
 inline const char* separator()
@@ -116,8 +122,9 @@ inline const char* separator()
 inline void markProviderEntry(
     const std::string& component, const char* function, const char* file, unsigned line)
 {
-    emit({"markProviderEntry", detail::TraceFile, 336}, component, Mark, detail::separator);
-    emit({"markProviderEntry", detail::TraceFile, 337}, component, Mark,
+    emit({"markProviderEntry", detail::traceFile, detail::entrySeparatorLine}, component, markLevel,
+        detail::separator);
+    emit({"markProviderEntry", detail::traceFile, detail::enteringLine}, component, markLevel,
         [&] { return trace(function, file, line, Entering); });
 }
 
@@ -125,9 +132,10 @@ inline void markProviderEntry(
 inline void markProviderExit(
     const std::string& component, const char* function, const char* file, unsigned line)
 {
-    emit({"markProviderExit", detail::TraceFile, 348}, component, Mark,
+    emit({"markProviderExit", detail::traceFile, detail::exitingLine}, component, markLevel,
         [&] { return trace(function, file, line, Exiting); });
-    emit({"markProviderExit", detail::TraceFile, 349}, component, Mark, detail::separator);
+    emit({"markProviderExit", detail::traceFile, detail::exitSeparatorLine}, component, markLevel,
+        detail::separator);
 }
 
 } // namespace Vorn

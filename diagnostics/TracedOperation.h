@@ -17,6 +17,12 @@ struct TraceModule {
     const char* file;
 };
 
+// The line numbers of an operation's entering and exiting lines, where these are fixed.
+struct OperationLines {
+    unsigned entry;
+    unsigned exit;
+};
+
 // Labels and values one after the other, as a parameter list prints them.
 template <typename... LabelsAndValues>
 std::string parameterList(const LabelsAndValues&... items)
@@ -30,7 +36,7 @@ std::string parameterList(const LabelsAndValues&... items)
 inline void traceMessage(
     const TraceModule& module, const char* function, unsigned line, const char* text)
 {
-    emit({function, module.file, line}, module.component, Failure,
+    emit({function, module.file, line}, module.component, failureLevel,
         [&] { return trace(text, module.file, line, Message); });
 }
 
@@ -50,7 +56,7 @@ public:
 private:
     void mark(MessageType type, unsigned line) const
     {
-        emit({function_, module_.file, line}, module_.component, MarkWithParameters,
+        emit({function_, module_.file, line}, module_.component, markWithParametersLevel,
             [&] { return tracepara(function_, module_.file, line, parameters_().c_str(), type); });
     }
 
@@ -73,7 +79,7 @@ public:
 private:
     void mark(MessageType type, unsigned line) const
     {
-        emit({function_, module_.file, line}, module_.component, Mark,
+        emit({function_, module_.file, line}, module_.component, markLevel,
             [&] { return trace(function_, module_.file, line, type); });
     }
 

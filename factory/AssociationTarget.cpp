@@ -6,6 +6,7 @@
 #include "factory/ClassNames.h"
 #include "factory/FactoryModule.h"
 #include "factory/SensorFactory.h"
+#include "factory/TraceLines.h"
 
 #include <array>
 #include <cstring>
@@ -23,19 +24,19 @@ struct AssociationEnd {
     unsigned exitingLine;
 };
 
-constexpr const char* TargetIsPackage = "Target Class is PhysicalPackageClass";
-constexpr const char* TargetIsSystem = "Target Class is ComputerSystemClass";
-constexpr unsigned NoTargetLine = 1259;
+constexpr const char* targetIsPackage = "Target Class is PhysicalPackageClass";
+constexpr const char* targetIsSystem = "Target Class is ComputerSystemClass";
 
-constexpr std::array<AssociationEnd, 4> AssociationEnds = {{
+constexpr std::array<AssociationEnd, 4> associationEnds = {{
     {ComputerSystemClass, SensorSystemDeviceClass, SensorClass, SensorSystemDeviceProvider,
-        TargetIsPackage, 1205},
+        targetIsPackage, FactoryLines::targetOfSystem},
     {SensorClass, SensorSystemDeviceClass, ComputerSystemClass, SensorSystemDeviceProvider,
-        TargetIsSystem, 1221},
+        targetIsSystem, FactoryLines::targetOfSensorInSystem},
     {SensorClass, SensorElementCapabilitiesClass, SensorEnabledLogicalElementCapClass,
-        SensorElementCapabilitiesProvider, TargetIsPackage, 1236},
+        SensorElementCapabilitiesProvider, targetIsPackage,
+        FactoryLines::targetOfSensorWithCapabilities},
     {SensorEnabledLogicalElementCapClass, SensorElementCapabilitiesClass, SensorClass,
-        SensorElementCapabilitiesProvider, TargetIsSystem, 1252},
+        SensorElementCapabilitiesProvider, targetIsSystem, FactoryLines::targetOfCapabilities},
 }};
 
 // Letter for letter; what was not given equals nothing.
@@ -48,7 +49,7 @@ bool areEqual(const char* one, const char* other)
 const AssociationEnd* findEnd(
     const CMPIString* sourceClass, const char* associationClass, CMPIStatus* rc)
 {
-    for (const AssociationEnd& end : AssociationEnds)
+    for (const AssociationEnd& end : associationEnds)
         if (areEqual(charactersOf(sourceClass, rc), end.sourceClass) &&
             areEqual(associationClass, end.associationClass))
             return &end;
@@ -72,10 +73,10 @@ const char* SensorFactory::get_assoc_targetClass_Name(const CMPIBroker* broker,
 {
     const TracedOperation traced(factoryModule(), "get_assoc_targetClass_Name",
         associationParameters(broker, ref, _RefLeftClass, _RefRightClass, rc));
-    traced.entering(1185);
+    traced.entering(FactoryLines::targetNameEntry);
     const AssociationEnd* const end = findEnd(classNameOf(ref, rc), _RefLeftClass, rc);
     if (end == nullptr) {
-        traced.exiting(NoTargetLine);
+        traced.exiting(FactoryLines::noTarget);
         return nullptr;
     }
     traceToBroker(broker, CMPI_LEV_INFO, end->provider, end->traceText);
@@ -89,11 +90,11 @@ CMPIObjectPath* SensorFactory::get_assoc_targetClass_ObjectPath(const CMPIBroker
 {
     const TracedOperation traced(factoryModule(), "get_assoc_targetClass_ObjectPath",
         associationParameters(broker, ref, _RefLeftClass, _RefRightClass, rc));
-    traced.entering(1288);
+    traced.entering(FactoryLines::targetPath.entry);
     const char* const target =
         get_assoc_targetClass_Name(broker, ref, _RefLeftClass, _RefRightClass, rc);
     CMPIObjectPath* const path = target ? newPath(broker, ref, target, rc) : nullptr;
-    traced.exiting(1316);
+    traced.exiting(FactoryLines::targetPath.exit);
     return path;
 }
 

@@ -6,6 +6,7 @@
 #include "factory/ClassNames.h"
 #include "factory/FactoryModule.h"
 #include "factory/SensorFactory.h"
+#include "factory/TraceLines.h"
 
 namespace Vorn::SensorProfileProvider {
 
@@ -18,11 +19,11 @@ int SensorFactory::getAllSensorEnabledLogicalElementCapCMPIInstances(const CMPIB
             return parameterList(" broker=", broker, " ref=", ref, " properties=", properties,
                 " isObjPath=", isObjPath, " instances=", &instances, " rc=", rc);
         });
-    traced.entering(996);
+    traced.entering(FactoryLines::getAllCapabilitiesInstances.entry);
     for (const auto& [instanceID, capabilities] : sensorEnabledLogCapMap)
         instances.push_back(makeSensorEnabledLogicalElementCapInstance(
             broker, ref, capabilities, properties, isObjPath, rc));
-    traced.exiting(1017);
+    traced.exiting(FactoryLines::getAllCapabilitiesInstances.exit);
     return 0;
 }
 
@@ -35,7 +36,7 @@ int SensorFactory::getOneSensorEnabledLogicalElementCapCMPIInstance(const CMPIBr
             return parameterList(" broker=", broker, " ref=", ref, " key=", key,
                 " properties=", properties, " instances=", &instances, " rc=", rc);
         });
-    traced.entering(1134);
+    traced.entering(FactoryLines::getOneCapabilitiesInstance.entry);
     const char* const instanceID = charactersOf(key, rc);
     const auto found =
         instanceID ? sensorEnabledLogCapMap.find(instanceID) : sensorEnabledLogCapMap.end();
@@ -43,7 +44,7 @@ int SensorFactory::getOneSensorEnabledLogicalElementCapCMPIInstance(const CMPIBr
         return 1; // without an exiting line
     instances.push_back(makeSensorEnabledLogicalElementCapInstance(
         broker, ref, found->second, properties, false, rc));
-    traced.exiting(1158);
+    traced.exiting(FactoryLines::getOneCapabilitiesInstance.exit);
     return 0;
 }
 
@@ -55,11 +56,11 @@ int SensorFactory::getAllSensorEnabledLogicalElementCapCMPIObjPaths(const CMPIBr
             return parameterList(" broker=", broker, " ref=", ref, " objectPaths=", &objectPaths,
                 " status=", status);
         });
-    traced.entering(1041);
+    traced.entering(FactoryLines::getAllCapabilitiesPaths.entry);
     if (sensorEnabledLogCapMap.empty()) {
         traceToBroker(broker, CMPI_LEV_WARNING, SensorEnabledLogicalElementCapabilitiesProvider,
             "***No instance found***");
-        traced.exiting(1104);
+        traced.exiting(FactoryLines::getAllCapabilitiesPathsOfNone);
         return 1;
     }
     for (auto [instanceID, capabilities] : sensorEnabledLogCapMap) {
@@ -75,7 +76,7 @@ int SensorFactory::getAllSensorEnabledLogicalElementCapCMPIObjPaths(const CMPIBr
         addTextKey(path, "InstanceID", capabilities.getInstanceID().c_str());
         objectPaths.push_back(path);
     }
-    traced.exiting(1093);
+    traced.exiting(FactoryLines::getAllCapabilitiesPaths.exit);
     return 0;
 }
 

@@ -8,6 +8,7 @@
 #include "factory/InstanceWriter.h"
 #include "factory/PropertySelection.h"
 #include "factory/SensorFactory.h"
+#include "factory/TraceLines.h"
 
 #include <cmpimacs.h>
 
@@ -43,7 +44,7 @@ CMPIInstance* SensorFactory::makeSensorEnabledLogicalElementCapInstance(const CM
             return parameterList(" broker=", broker, " ref=", ref, " snsrCap=", &snsrCap,
                 " properties=", properties, " IsObjPath=", isObjPath, " rc=", rc);
         });
-    traced.entering(863);
+    traced.entering(FactoryLines::makeCapabilitiesInstance.entry);
     const PropertySelection selection(properties, isObjPath);
     CMPIInstance* const instance = newCapabilitiesInstance(broker, ref, properties, rc);
     if (isUsable(instance)) {
@@ -59,7 +60,7 @@ CMPIInstance* SensorFactory::makeSensorEnabledLogicalElementCapInstance(const CM
                 "RequestedStatesSupported failed.");
         writer.setFlag("ElementNameEditSupported", snsrCap.getElementNameEditSupported());
     }
-    traced.exiting(965);
+    traced.exiting(FactoryLines::makeCapabilitiesInstance.exit);
     return instance;
 }
 

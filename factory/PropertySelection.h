@@ -19,8 +19,8 @@ public:
     {
         if (properties == nullptr)
             return;
-        constexpr auto Last = std::numeric_limits<std::uint16_t>::max();
-        for (std::uint16_t i = 0; properties[i] != nullptr && i < Last; ++i)
+        constexpr auto last = std::numeric_limits<std::uint16_t>::max();
+        for (std::uint16_t i = 0; properties[i] != nullptr && i < last; ++i)
             names_.insert(properties[i]);
     }
 

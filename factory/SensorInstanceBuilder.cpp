@@ -8,6 +8,7 @@
 #include "factory/InstanceWriter.h"
 #include "factory/PropertySelection.h"
 #include "factory/SensorFactory.h"
+#include "factory/TraceLines.h"
 #include "platform/locale/FormatText.h"
 #include "platform/locale/Locale.h"
 #include "platform/locale/ResourceString.h"
@@ -21,20 +22,20 @@ namespace Vorn::SensorProfileProvider {
 
 namespace {
 
-constexpr const char* Function = "makeSensorInstance";
+constexpr const char* operation = "makeSensorInstance";
 
 // The number by which the localised texts know this library.
-constexpr unsigned long ResourceComponent = 2;
+constexpr unsigned long resourceComponent = 2;
 
 // Captions and descriptions are cut to one character less than this.
-constexpr std::size_t LocalisedTextSize = 512;
+constexpr std::size_t localisedTextSize = 512;
 
 std::string localised(const wchar_t* messageId, const std::string& elementName)
 {
     const std::wstring library =
-        Locale::getResourceLibrary(ResourceComponent, Locale::getLanguageId());
+        Locale::getResourceLibrary(resourceComponent, Locale::getLanguageId());
     const ResourceString resource(library, messageId);
-    return make_string(formatText(resource.text(), elementName, LocalisedTextSize));
+    return make_string(formatText(resource.text(), elementName, localisedTextSize));
 }
 
 // The instance with its filter and keys. Null, or the handle-less instance the broker returned,
@@ -67,13 +68,13 @@ struct ArrayFailure {
 };
 
 // The runs of blanks are part of the texts.
-constexpr const char* SupportedThresholdsFailed =
+constexpr const char* supportedThresholdsFailed =
     "Create Array for Property                         SupportedThresholds failed.";
-constexpr const char* SettableThresholdsFailed =
+constexpr const char* settableThresholdsFailed =
     "Create Array for Property                         SettableThresholds failed.";
-constexpr const char* OperationalStatusFailed =
+constexpr const char* operationalStatusFailed =
     "Create Array for Property                         OperationalStatus failed.";
-constexpr const char* OperationalStatusFailedTrace =
+constexpr const char* operationalStatusFailedTrace =
     "Create Array for Property Operat                        ionalStatus failed.";
 
 // Sets the selected properties of one instance in their order.
@@ -93,12 +94,13 @@ public:
         setCode("BaseUnits", sensor_.getBaseUnits());
         setCode("RateUnits", sensor_.getRateUnits());
         if (!setCodes("SupportedThresholds", sensor_.getSupportedThresholds()))
-            return ArrayFailure{SupportedThresholdsFailed, SupportedThresholdsFailed, {}};
+            return ArrayFailure{supportedThresholdsFailed, supportedThresholdsFailed, {}};
         if (!setCodes("SettableThresholds", sensor_.getSettableThresholds()))
-            return ArrayFailure{SettableThresholdsFailed, SettableThresholdsFailed, {}};
+            return ArrayFailure{settableThresholdsFailed, settableThresholdsFailed, {}};
         setStates();
         if (!setCodes("OperationalStatus", sensor_.getOperationalStatus()))
-            return ArrayFailure{OperationalStatusFailed, OperationalStatusFailedTrace, 615};
+            return ArrayFailure{operationalStatusFailed, operationalStatusFailedTrace,
+                FactoryLines::operationalStatusFailed};
         setMeasurements();
         return std::nullopt;
     }
@@ -124,8 +126,8 @@ private:
         if (static_cast<std::uint16_t>(states.size()) == 0)
             return; // unlike a list of codes, an empty list of labels is not published
         if (!writer_.setTexts("PossibleStates", states, rc_))
-            traceMessage(
-                factoryModule(), Function, 440, "Failed to create CMPIArray for PossibleStates");
+            traceMessage(factoryModule(), operation, FactoryLines::possibleStatesFailed,
+                "Failed to create CMPIArray for PossibleStates");
     }
 
     void setStates() const
@@ -192,11 +194,11 @@ private:
 CMPIInstance* SensorFactory::makeSensorInstance(const CMPIBroker* broker, const CMPIObjectPath* ref,
     Sensor snsr, const char** properties, bool isObjPath, CMPIStatus* rc)
 {
-    const TracedOperation traced(factoryModule(), Function, [&] {
+    const TracedOperation traced(factoryModule(), operation, [&] {
         return parameterList(" broker=", broker, " ref=", ref, " snsr=", &snsr,
             " properties=", properties, " isObjPath=", isObjPath, " rc=", rc);
     });
-    traced.entering(269);
+    traced.entering(FactoryLines::makeSensorInstance.entry);
     const PropertySelection selection(properties, isObjPath);
     CMPIInstance* const instance = newSensorInstance(broker, ref, snsr, properties);
     if (isUsable(instance)) {
@@ -210,7 +212,7 @@ CMPIInstance* SensorFactory::makeSensorInstance(const CMPIBroker* broker, const 
             return instance;
         }
     }
-    traced.exiting(737);
+    traced.exiting(FactoryLines::makeSensorInstance.exit);
     return instance;
 }
 

@@ -19,12 +19,12 @@ static_assert(std::numeric_limits<long double>::digits >= 64);
 template <typename Number>
 std::int32_t truncated(Number product)
 {
-    constexpr std::int32_t OutOfRange = std::numeric_limits<std::int32_t>::min();
-    constexpr Number Above = 2147483648.0;
-    constexpr Number Below = -2147483649.0;
-    if (product > Below && product < Above) // false for what is not a number
+    constexpr std::int32_t outOfRange = std::numeric_limits<std::int32_t>::min();
+    constexpr Number above = 2147483648.0;
+    constexpr Number below = -2147483649.0;
+    if (product > below && product < above) // false for what is not a number
         return static_cast<std::int32_t>(product);
-    return OutOfRange;
+    return outOfRange;
 }
 
 template <typename Element, typename List>
@@ -34,10 +34,10 @@ void appendTimes(std::vector<Element>& elements, const List& list, unsigned time
         elements.insert(elements.end(), list.begin(), list.end());
 }
 
-std::vector<std::uint16_t> thresholdCodes(unsigned times)
+std::vector<std::uint16_t> repeatedThresholdCodes(unsigned times)
 {
     std::vector<std::uint16_t> codes;
-    appendTimes(codes, ThresholdCodes, times);
+    appendTimes(codes, thresholdCodes, times);
     return codes;
 }
 
@@ -57,8 +57,8 @@ std::vector<std::string> Sensor::getPossibleStates()
 {
     std::vector<std::string> labels;
     for (const unsigned status : possibleStates_)
-        labels.emplace_back(StateLabels[status]);
-    appendTimes(labels, FixedStateLabels, ++fixedStateLabels_);
+        labels.emplace_back(stateLabels[status]);
+    appendTimes(labels, fixedStateLabels, ++fixedStateLabels_);
     return labels;
 }
 
@@ -70,12 +70,12 @@ std::uint16_t Sensor::getRateUnits()
 
 std::vector<std::uint16_t> Sensor::getSupportedThresholds()
 {
-    return thresholdCodes(++supportedThresholds_);
+    return repeatedThresholdCodes(++supportedThresholds_);
 }
 
 std::vector<std::uint16_t> Sensor::getSettableThresholds()
 {
-    return thresholdCodes(++settableThresholds_);
+    return repeatedThresholdCodes(++settableThresholds_);
 }
 
 bool Sensor::setDeviceID(std::string deviceID)
@@ -110,7 +110,7 @@ bool Sensor::setUnitModifier(int powerOfTen)
 
 bool Sensor::setSensorType(unsigned sensorType)
 {
-    const TypeAndScale& found = SensorTypes[sensorType];
+    const TypeAndScale& found = sensorTypes[sensorType];
     sensorType_ = found.sensorType;
     readingMultiplier_ = found.multiplier;
     unitModifier_ = found.unitModifier;
@@ -121,19 +121,19 @@ bool Sensor::setSensorType(unsigned sensorType)
 
 bool Sensor::setEnabledState(unsigned nodeStatus)
 {
-    enabledState_ = EnabledStates[nodeStatus];
+    enabledState_ = enabledStates[nodeStatus];
     return true;
 }
 
 bool Sensor::setRequestedState(unsigned code)
 {
-    requestedState_ = RequestedStates[code];
+    requestedState_ = requestedStates[code];
     return true;
 }
 
 bool Sensor::setHealthState(unsigned nodeStatus)
 {
-    const Health& health = HealthStates[nodeStatus];
+    const Health& health = healthStates[nodeStatus];
     healthState_ = health.state;
     healthStatus_ = health.status;
     return true;
@@ -141,25 +141,25 @@ bool Sensor::setHealthState(unsigned nodeStatus)
 
 bool Sensor::setCurrentState(unsigned nodeStatus)
 {
-    currentState_ = StateLabels[nodeStatus];
+    currentState_ = stateLabels[nodeStatus];
     return true;
 }
 
 bool Sensor::setOperationalStatus(unsigned nodeStatus)
 {
-    operationalStatus_.push_back(OperationalStatuses[nodeStatus]);
+    operationalStatus_.push_back(operationalStatuses[nodeStatus]);
     return true;
 }
 
 bool Sensor::setPossibleStates(std::vector<unsigned> nodeStatuses)
 {
-    constexpr unsigned Unknown = 0; // without a label of its own, as what is too large
-    constexpr unsigned Largest = std::numeric_limits<Codes::value_type>::max();
+    constexpr unsigned unknown = 0; // without a label of its own, as what is too large
+    constexpr unsigned largest = std::numeric_limits<Codes::value_type>::max();
     possibleStates_.clear();
     fixedStateLabels_ = 0;
     for (const unsigned status : nodeStatuses)
         possibleStates_.push_back(
-            static_cast<Codes::value_type>(status <= Largest ? status : Unknown));
+            static_cast<Codes::value_type>(status <= largest ? status : unknown));
     return true;
 }
 

@@ -3,7 +3,7 @@
 #include "model/SensorHarvest.h"
 
 #include "diagnostics/ProviderException.h"
-#include "diagnostics/TracedOperation.h"
+#include "model/TraceLines.h"
 #include "platform/instrumentation/Instrumentation.h"
 #include "platform/logging/PipeSignal.h"
 
@@ -26,11 +26,11 @@ TraceModule module()
     return {loggerSensor, "Sensor"};
 }
 
-constexpr std::array<NodeType, 3> HarvestedTypes = {
+constexpr std::array<NodeType, 3> harvestedTypes = {
     NodeType::Temperature, NodeType::Voltage, NodeType::Tachometer};
 
 // What the request handlers ask of every sensor.
-constexpr unsigned RequestedEnabled = 1;
+constexpr unsigned requestedEnabled = 1;
 
 struct ScaledProperty {
     Properties property;
@@ -39,7 +39,7 @@ struct ScaledProperty {
 };
 
 // In the order in which they are read.
-constexpr std::array<ScaledProperty, 7> ScaledProperties = {{
+constexpr std::array<ScaledProperty, 7> scaledProperties = {{
     {Properties::Reading, &Sensor::setCurrentReading, "Failed while setting Current Reading"},
     {Properties::LowerNonCritical, &Sensor::setLowerThresholdNonCritical,
         "Failed while setting LowerThresholdNonCritical"},
@@ -88,7 +88,7 @@ void setProperties(Sensor& sensor, Instrumentation& node, std::vector<unsigned>&
         require(sensor.setPossibleStates(possibleStates), "Failed while setting Possible States");
 
     double number = 0.0;
-    for (const ScaledProperty& scaled : ScaledProperties)
+    for (const ScaledProperty& scaled : scaledProperties)
         if (node.getProperty(scaled.property, number))
             require((sensor.*scaled.set)(number), scaled.refusal);
 
@@ -113,9 +113,9 @@ bool getSensorInstances(std::vector<Sensor>& vectSensor)
 {
     const TracedOperation traced(
         module(), "getSensorInstances", [&] { return parameterList(" vectSensor=", &vectSensor); });
-    traced.entering(668);
+    traced.entering(HarvestLines::getSensorInstances.entry);
     bool nothing = true;
-    for (const NodeType type : HarvestedTypes) {
+    for (const NodeType type : harvestedTypes) {
         try {
             if (harvestType(type, vectSensor))
                 nothing = false;
@@ -125,7 +125,7 @@ bool getSensorInstances(std::vector<Sensor>& vectSensor)
             RynLog::writeToStandardError(std::string(generic.what()) + '\n');
         }
     }
-    traced.exiting(732);
+    traced.exiting(HarvestLines::getSensorInstances.exit);
     return nothing;
 }
 
@@ -134,18 +134,18 @@ bool setVector(std::vector<Sensor>& vectSensor, Vorn::Instrumentation& instrumen
     const TracedOperation traced(module(), "setVector", [&] {
         return parameterList(" vectSensor=", &vectSensor, " instrumentation=", &instrumentation);
     });
-    traced.entering(740);
+    traced.entering(HarvestLines::setVector.entry);
     std::vector<unsigned> possibleStates;
     while (instrumentation) {
         Sensor sensor;
         setIdentity(sensor, instrumentation);
         setStatus(sensor, instrumentation.getNodeStatus());
-        require(sensor.setRequestedState(RequestedEnabled), "Failed while setting Requested State");
+        require(sensor.setRequestedState(requestedEnabled), "Failed while setting Requested State");
         setProperties(sensor, instrumentation, possibleStates);
         vectSensor.push_back(std::move(sensor));
         ++instrumentation;
     }
-    traced.exiting(920);
+    traced.exiting(HarvestLines::setVector.exit);
     return false;
 }
 
@@ -153,15 +153,15 @@ bool getSensorEnabledLogCapInstances(std::vector<SensorEnabledLogCap>& vectSenso
 {
     const TracedOperation traced(module(), "getSensorEnabledLogCapInstances",
         [&] { return parameterList(" vectSensorEnabledLogCap=", &vectSensorEnabledLogCap); });
-    traced.entering(639);
+    traced.entering(HarvestLines::getSensorEnabledLogCapInstances.entry);
     try {
         vectSensorEnabledLogCap.push_back(SensorEnabledLogCap());
     } catch (const std::exception& error) {
         RynLog::writeToStandardError(std::string(error.what()) + '\n');
-        traced.exiting(654);
+        traced.exiting(HarvestLines::getSensorEnabledLogCapInstancesFailed);
         return true;
     }
-    traced.exiting(660);
+    traced.exiting(HarvestLines::getSensorEnabledLogCapInstances.exit);
     return false;
 }
 

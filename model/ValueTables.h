@@ -49,20 +49,20 @@ struct Health {
 };
 
 // clang-format off
-inline constexpr ValueTable<TypeAndScale, 3> SensorTypes = {{{
+inline constexpr ValueTable<TypeAndScale, 3> sensorTypes = {{{
     {20, {5, 1.0, 0, true}},     // Tachometer
     {21, {3, 1000.0, -3, true}}, // Voltage, published in millivolts
     {22, {2, 1.0, 0, true}},     // Temperature
 }}, {0, 1.0, 0, false}};         // Unknown
 
-inline constexpr ValueTable<std::uint16_t, 4> EnabledStates = {{{
+inline constexpr ValueTable<std::uint16_t, 4> enabledStates = {{{
     {0, 0},  // Unknown
     {1, 2},  // Enabled
     {12, 6}, // Enabled but Offline
     {16, 3}, // Disabled
 }}, 5};      // Not Applicable
 
-inline constexpr ValueTable<std::uint16_t, 7> RequestedStates = {{{
+inline constexpr ValueTable<std::uint16_t, 7> requestedStates = {{{
     {0, 0},  // Unknown
     {1, 2},  // Enabled
     {3, 4},  // Shut Down
@@ -72,7 +72,7 @@ inline constexpr ValueTable<std::uint16_t, 7> RequestedStates = {{{
     {16, 3}, // Disabled
 }}, 12};     // Not Applicable
 
-inline constexpr ValueTable<Health, 8> HealthStates = {{{
+inline constexpr ValueTable<Health, 8> healthStates = {{{
     {0, {0, "UnKnown"}},
     {20, {10, "Error"}}, // Degraded/Warning
     {21, {10, "Error"}},
@@ -83,7 +83,7 @@ inline constexpr ValueTable<Health, 8> HealthStates = {{{
     {26, {25, "Error"}},
 }}, {5, "OK"}};
 
-inline constexpr ValueTable<const char*, 9> StateLabels = {{{
+inline constexpr ValueTable<const char*, 9> stateLabels = {{{
     {1, "Normal"},
     {12, "Offline"},
     {16, "Disabled"},
@@ -95,7 +95,7 @@ inline constexpr ValueTable<const char*, 9> StateLabels = {{{
     {26, "CriticalHigh"},
 }}, "Unknown"};
 
-inline constexpr ValueTable<std::uint16_t, 9> OperationalStatuses = {{{
+inline constexpr ValueTable<std::uint16_t, 9> operationalStatuses = {{{
     {0, 0},   // Unknown
     {1, 2},   // OK
     {2, 8},   // Starting
@@ -109,12 +109,12 @@ inline constexpr ValueTable<std::uint16_t, 9> OperationalStatuses = {{{
 // clang-format on
 
 // Published for every sensor after the states its node names.
-inline constexpr std::array<const char*, 12> FixedStateLabels = {"Normal", "Warning",
+inline constexpr std::array<const char*, 12> fixedStateLabels = {"Normal", "Warning",
     "Non-Critical", "Lower Non-Critical", "Upper Non-Critical", "Critical", "Lower Critical",
     "Upper Critical", "Fatal", "Lower Fatal", "Upper Fatal", "Unknown"};
 
 // LowerThresholdNonCritical, UpperThresholdNonCritical, LowerThresholdCritical,
 // UpperThresholdCritical, LowerThresholdFatal, UpperThresholdFatal.
-inline constexpr std::array<std::uint16_t, 6> ThresholdCodes = {0, 1, 2, 3, 4, 5};
+inline constexpr std::array<std::uint16_t, 6> thresholdCodes = {0, 1, 2, 3, 4, 5};
 
 } // namespace Vorn::SensorProfileProvider

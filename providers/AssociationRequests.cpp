@@ -48,10 +48,9 @@ void AssociationRequest::returnReferences(Answer answer, const CMPIResult* rslt,
             leadsToSensors ? served_.pair(farEnd, op) : served_.pair(op, farEnd), nullptr,
             nullptr));
     });
-    forEachCounted(associations, [&](const CMPIInstance* association) {
+    for (const CMPIInstance* const association : associations)
         if (isUsable(association))
             returnAssociation(answer, rslt, op, association, status);
-    });
 }
 
 void addReferenceKeys(const CMPIObjectPath* path, const References& references)

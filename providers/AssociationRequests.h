@@ -45,9 +45,9 @@ struct FailureTexts {
 };
 
 // The message lines of fetches that failed.
-inline constexpr const char* SensorsFailed = "getAllSensorCMPIInstances failed";
-inline constexpr const char* SensorPathsFailed = "getAllSensorCMPIObjPaths failed";
-inline constexpr const char* CapabilitiesPathsFailed =
+inline constexpr const char* sensorsFailed = "getAllSensorCMPIInstances failed";
+inline constexpr const char* sensorPathsFailed = "getAllSensorCMPIObjPaths failed";
+inline constexpr const char* capabilitiesPathsFailed =
     "getAllSensorEnabledLogicalElementCapCMPIObjPaths failed";
 
 // What came of fetching one end's objects.
@@ -92,7 +92,7 @@ public:
         CMPIStatus status = {CMPI_RC_OK, nullptr};
         std::vector<CMPIInstance*> instances;
         if (keyCountOf(op, &status) == 0)
-            fail({NoKeyPassed, NoKeyPassed, NoKeyPassed}, &status, line);
+            fail({noKeyPassed, noKeyPassed, noKeyPassed}, &status, line);
         else if (build(instances) == 0)
             returnInstanceAt(rslt, op, instances, true, &status);
         marks_.exit(line);
@@ -118,7 +118,7 @@ public:
     FetchFailure fetchSensorPaths(SensorFactory& factory, const CMPIObjectPath* op,
         std::vector<CMPIObjectPath*>& paths, CMPIStatus* status) const
     {
-        return {factory.getAllSensorCMPIObjPaths(broker_, op, paths, status) ? SensorPathsFailed
+        return {factory.getAllSensorCMPIObjPaths(broker_, op, paths, status) ? sensorPathsFailed
                                                                              : nullptr};
     }
 

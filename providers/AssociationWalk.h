@@ -27,7 +27,7 @@ public:
     }
 
     // Whether the factory ended the walk because there is nothing, not because it failed.
-    bool foundNothing() const { return result_ == NothingFound; }
+    bool foundNothing() const { return result_ == nothingFound; }
 
 protected:
     const AssociationRequest& request() const { return request_; }
@@ -68,7 +68,7 @@ protected:
     }
 
 private:
-    static constexpr int NothingFound = 1; // of the factory's results
+    static constexpr int nothingFound = 1; // of the factory's results
 
     const AssociationRequest& request_;
     const CMPIObjectPath* op_;

@@ -109,7 +109,7 @@ CMPIStatus getInstance(const RecordClass& served, const CMPIBroker* broker, cons
     marks.entry(lines.entry);
     CMPIStatus status = {CMPI_RC_OK, nullptr};
     if (keyCountOf(ref, &status) == 0) {
-        reportFailure(broker, &status, served.provider, NoKeyPassed, NoKeyPassed);
+        reportFailure(broker, &status, served.provider, noKeyPassed, noKeyPassed);
     } else if (CMPIString* const key = textKey(ref, served.key, &status)) {
         if (!returnByKey(
                 served, broker, marks, lines.noSuchKey, rslt, ref, key, properties, &status))

@@ -7,6 +7,7 @@
 
 #include "diagnostics/TracedOperation.h"
 #include "factory/SensorFactory.h"
+#include "providers/TraceLines.h"
 
 #include <cmpidt.h>
 
@@ -29,23 +30,6 @@ struct RecordClass {
     const char* pathsFailed;
     const char* instancesFailed;
     const char* oneFailed;
-};
-
-// The lines that a handler's trace points carry.
-struct FailureLines {
-    unsigned message;
-    unsigned exit;
-};
-struct EnumerationLines {
-    unsigned entry;
-    FailureLines failure;
-    unsigned exit;
-};
-struct GetInstanceLines {
-    unsigned entry;
-    FailureLines noSuchKey;
-    FailureLines enumeration;
-    unsigned exit;
 };
 
 // Each answers one request from its entry to its exit mark. `function` is the handler's name.

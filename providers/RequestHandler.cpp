@@ -7,6 +7,8 @@
 
 #include <cmpimacs.h>
 
+#include <algorithm>
+
 namespace Vorn::SensorProfileProvider {
 
 CMPICount keyCountOf(const CMPIObjectPath* ref, CMPIStatus* status)
@@ -17,8 +19,8 @@ CMPICount keyCountOf(const CMPIObjectPath* ref, CMPIStatus* status)
 CMPIString* textKey(const CMPIObjectPath* ref, const char* name, CMPIStatus* status)
 {
     const CMPIData key = CMGetKey(ref, name, status);
-    constexpr CMPIValueState Absent = CMPI_nullValue | CMPI_notFound | CMPI_badValue;
-    if (key.type == CMPI_string && (key.state & Absent) == 0 && isUsable(key.value.string))
+    constexpr CMPIValueState absent = CMPI_nullValue | CMPI_notFound | CMPI_badValue;
+    if (key.type == CMPI_string && (key.state & absent) == 0 && isUsable(key.value.string))
         return key.value.string;
     *status = {CMPI_RC_OK, nullptr};
     return nullptr;
@@ -33,12 +35,12 @@ void returnInstances(const CMPIResult* rslt, const std::vector<CMPIInstance*>& i
 void returnPaths(const CMPIResult* rslt, const CMPIObjectPath* ref,
     const std::vector<CMPIObjectPath*>& paths, CMPIStatus* status)
 {
-    forEachCounted(paths, [&](const CMPIObjectPath* path) {
+    for (const CMPIObjectPath* const path : paths) {
         if (!isUsable(path))
-            return;
+            continue;
         copyNameSpace(path, ref, status);
         CMReturnObjectPath(rslt, path);
-    });
+    }
 }
 
 void returnInstanceAt(const CMPIResult* rslt, const CMPIObjectPath* ref,

@@ -48,7 +48,7 @@ private:
     const char* function_;
 };
 
-inline constexpr const char* NoKeyPassed = "At least one key should be passed";
+inline constexpr const char* noKeyPassed = "At least one key should be passed";
 
 // How many keys the request's path has, 0 when it cannot say.
 CMPICount keyCountOf(const CMPIObjectPath* ref, CMPIStatus* status);
@@ -57,7 +57,8 @@ CMPICount keyCountOf(const CMPIObjectPath* ref, CMPIStatus* status);
 // handle. Some object managers report an absent key through the status; it is OK afterwards.
 CMPIString* textKey(const CMPIObjectPath* ref, const char* name, CMPIStatus* status);
 
-// Visits as many elements as a count cut to 16 bits says.
+// Visits as many elements as a count cut to 16 bits says. A factory holds fewer than 65,536 objects
+// of a class, so only what comes from pairs or from other providers can be more.
 template <typename Object, typename Visit>
 void forEachCounted(const std::vector<Object*>& objects, const Visit& visit)
 {
@@ -73,8 +74,9 @@ void returnInstances(const CMPIResult* rslt, const std::vector<CMPIInstance*>& i
 void returnPaths(const CMPIResult* rslt, const CMPIObjectPath* ref,
     const std::vector<CMPIObjectPath*>& paths, CMPIStatus* status);
 
-// Hands over the first instance whose object path names the same instance as the request's
-// path, if there is one.
+// Hands over the first instance whose object path names the same instance as the request's path,
+// if there is one among as many as a count cut to 16 bits says. `status` goes to the broker and
+// may be null.
 void returnInstanceAt(const CMPIResult* rslt, const CMPIObjectPath* ref,
     const std::vector<CMPIInstance*>& instances, bool comparesReferences, CMPIStatus* status);
 

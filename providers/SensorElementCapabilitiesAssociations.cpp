@@ -23,7 +23,7 @@ FetchFailure fetchPaths(const AssociationRequest& request, SensorFactory& factor
     if (isOfClass(target, SensorEnabledLogicalElementCapClass, status) &&
         factory.getAllSensorEnabledLogicalElementCapCMPIObjPaths(
             request.broker(), op, paths, status))
-        return {CapabilitiesPathsFailed};
+        return {capabilitiesPathsFailed};
     return {nullptr};
 }
 
@@ -39,7 +39,7 @@ FetchFailure fetchInstances(const AssociationRequest& request, SensorFactory& fa
     else if (isOfClass(target, SensorEnabledLogicalElementCapClass, status))
         result = factory.getAllSensorEnabledLogicalElementCapCMPIInstances(
             request.broker(), op, properties, false, instances, status);
-    return {result ? SensorsFailed : nullptr};
+    return {result ? sensorsFailed : nullptr};
 }
 
 // `withoutTarget` is the failure of a source whose class has no far end.

@@ -6,8 +6,6 @@
 #include "providers/AssociationWalk.h"
 #include "providers/SensorElementCapabilities.h"
 
-#include <cstdint>
-
 namespace Vorn::SensorProfileProvider {
 
 using namespace ElementCapabilities;
@@ -22,7 +20,7 @@ struct PairFailures {
     FailureTexts association;
 };
 
-constexpr PairFailures InstanceFailures = {
+constexpr PairFailures instanceFailures = {
     {"CMPIObjectPath is                 NULL for Sensor", "CMPIObjectPath is NULL for Sensor",
         "CMPIObjectPath is NULL for Sensor"},
     {"CMPIObjectPath is                     NULL for EnabledLogicalElementCap",
@@ -33,7 +31,7 @@ constexpr PairFailures InstanceFailures = {
         "Create CMPIObjectPath failed for ElementCapabilities"},
 };
 
-constexpr PairFailures NameFailures = {
+constexpr PairFailures nameFailures = {
     {"CMPIObjectPath is NULL for Sensor class", "CMPIObjectPath is NULL for Sensor class",
         "CMPIObjectPath is NULL for Sensor class"},
     {"CMPIObjectPath is                     NULL for SensorEnabledLogicalElementCap",
@@ -63,9 +61,8 @@ public:
         std::vector<CMPIObjectPath*> sensors;
         if (!fetchSensors(sensors))
             return WalkEnd::atSensors;
-        const auto count = static_cast<std::uint16_t>(sensors.size());
-        for (std::uint16_t i = 0; i < count; ++i) {
-            const WalkEnd end = walkCapabilities(sensors.at(i), visit);
+        for (const CMPIObjectPath* const sensor : sensors) {
+            const WalkEnd end = walkCapabilities(sensor, visit);
             if (end != WalkEnd::complete)
                 return end;
         }
@@ -82,9 +79,7 @@ private:
         std::vector<CMPIObjectPath*> capabilities;
         if (!fetchCapabilities(capabilities))
             return WalkEnd::atCapabilities;
-        const auto count = static_cast<std::uint16_t>(capabilities.size());
-        for (std::uint16_t i = 0; i < count; ++i) {
-            const CMPIObjectPath* const path = capabilities.at(i);
+        for (const CMPIObjectPath* const path : capabilities) {
             if (!isUsable(path))
                 return report(failures_.capabilities);
             if (!visitPair(sensor, path, failures_.association, visit))
@@ -109,7 +104,7 @@ int sensorElementCapabilitiesCMPIInstances(
 {
     const AssociationRequest request(served(), broker, "sensorElementCapabilitiesCMPIInstances");
     CMPIStatus status = {CMPI_RC_OK, nullptr};
-    PairWalk walk(request, InstanceFailures, op, &status);
+    PairWalk walk(request, instanceFailures, op, &status);
     walk.reserve(out);
     // Not the names of this association's references, but what the filter has always held.
     const char* keys[] = {"Antecedent", "Dependent", nullptr};
@@ -120,12 +115,12 @@ int sensorElementCapabilitiesCMPIInstances(
     if (end == WalkEnd::atSensors) {
         traceToBroker(request.broker(), CMPI_LEV_WARNING, SensorElementCapabilitiesProvider,
             "***Can't get Sensor ObjectPaths.             Exiting EnumerateInstanceNames***");
-        request.marks().failure(SensorPathsFailed);
+        request.marks().failure(sensorPathsFailed);
     } else if (end == WalkEnd::atCapabilities) {
         traceToBroker(request.broker(), CMPI_LEV_WARNING, SensorElementCapabilitiesProvider,
             "***Can't get ObjectPaths for                 EnabledLogicalElementCap"
             "                 Exiting EnumerateInstanceNames***");
-        request.marks().failure(CapabilitiesPathsFailed);
+        request.marks().failure(capabilitiesPathsFailed);
     }
     request.marks().exit();
     return end == WalkEnd::complete ? 0 : 1;
@@ -137,7 +132,7 @@ CMPIStatus SensorElementCapabilities_EnumInstanceNames(
     const AssociationRequest request(
         served(), broker, "SensorElementCapabilities_EnumInstanceNames");
     CMPIStatus status = {CMPI_RC_OK, nullptr};
-    PairWalk walk(request, NameFailures, op, &status);
+    PairWalk walk(request, nameFailures, op, &status);
     const WalkEnd end =
         walk.run([&](const CMPIObjectPath* association, const References& references) {
             addReferenceKeys(association, references);

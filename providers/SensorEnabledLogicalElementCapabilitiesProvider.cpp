@@ -42,24 +42,24 @@ CMPIStatus SensorEnabledLogicalElementCapabilities_EnumInstanceNames(
     CMPIInstanceMI*, const CMPIContext*, const CMPIResult* rslt, const CMPIObjectPath* ref)
 {
     return enumerateInstanceNames(capabilities(), broker,
-        "SensorEnabledLogicalElementCapabilities_EnumInstanceNames", {74, {90, 92}, 114}, rslt,
-        ref);
+        "SensorEnabledLogicalElementCapabilities_EnumInstanceNames",
+        CapabilitiesLines::enumInstanceNames, rslt, ref);
 }
 
 CMPIStatus SensorEnabledLogicalElementCapabilities_EnumInstances(CMPIInstanceMI*,
     const CMPIContext*, const CMPIResult* rslt, const CMPIObjectPath* ref, const char** properties)
 {
     return enumerateInstances(capabilities(), broker,
-        "SensorEnabledLogicalElementCapabilities_EnumInstances", {137, {153, 155}, 169}, rslt, ref,
-        properties);
+        "SensorEnabledLogicalElementCapabilities_EnumInstances", CapabilitiesLines::enumInstances,
+        rslt, ref, properties);
 }
 
 CMPIStatus SensorEnabledLogicalElementCapabilities_GetInstance(CMPIInstanceMI*, const CMPIContext*,
     const CMPIResult* rslt, const CMPIObjectPath* ref, const char** properties)
 {
     return getInstance(capabilities(), broker,
-        "SensorEnabledLogicalElementCapabilities_GetInstance", {191, {215, 217}, {243, 245}, 283},
-        rslt, ref, properties);
+        "SensorEnabledLogicalElementCapabilities_GetInstance", CapabilitiesLines::getInstance, rslt,
+        ref, properties);
 }
 
 namespace {

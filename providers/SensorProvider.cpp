@@ -40,21 +40,21 @@ CMPIStatus Sensor_EnumInstanceNames(
     CMPIInstanceMI*, const CMPIContext*, const CMPIResult* rslt, const CMPIObjectPath* ref)
 {
     return enumerateInstanceNames(
-        sensors(), broker, "Sensor_EnumInstanceNames", {74, {94, 96}, 114}, rslt, ref);
+        sensors(), broker, "Sensor_EnumInstanceNames", SensorLines::enumInstanceNames, rslt, ref);
 }
 
 CMPIStatus Sensor_EnumInstances(CMPIInstanceMI*, const CMPIContext*, const CMPIResult* rslt,
     const CMPIObjectPath* ref, const char** properties)
 {
-    return enumerateInstances(
-        sensors(), broker, "Sensor_EnumInstances", {136, {155, 157}, 170}, rslt, ref, properties);
+    return enumerateInstances(sensors(), broker, "Sensor_EnumInstances", SensorLines::enumInstances,
+        rslt, ref, properties);
 }
 
 CMPIStatus Sensor_GetInstance(CMPIInstanceMI*, const CMPIContext*, const CMPIResult* rslt,
     const CMPIObjectPath* ref, const char** properties)
 {
-    return getInstance(sensors(), broker, "Sensor_GetInstance", {192, {220, 222}, {251, 253}, 293},
-        rslt, ref, properties);
+    return getInstance(
+        sensors(), broker, "Sensor_GetInstance", SensorLines::getInstance, rslt, ref, properties);
 }
 
 namespace {

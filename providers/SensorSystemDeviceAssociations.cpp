@@ -14,7 +14,7 @@ using namespace SystemDevice;
 
 namespace {
 
-constexpr const char* UpcallFailed = "Call to CBEnumInstances of target Class Failed.";
+constexpr const char* upcallFailed = "Call to CBEnumInstances of target Class Failed.";
 
 // Whether a client that named this result class wants objects of the class, or of the standard
 // class it is derived from.
@@ -56,7 +56,7 @@ FetchFailure returnSensors(const AssociationRequest& request, Answer answer, con
         instances.reserve(factory.getNumberOfInstances());
         if (factory.getAllSensorCMPIInstances(
                 request.broker(), op, properties, false, instances, status))
-            return {SensorsFailed};
+            return {sensorsFailed};
         returnInstances(rslt, instances);
         return {nullptr};
     }
@@ -72,27 +72,27 @@ CMPIStatus associators(const char* function, Answer answer, const CMPIContext* c
     const CMPIResult* rslt, const CMPIObjectPath* op, const char* assocClass,
     const char* resultClass, const char** properties)
 {
-    constexpr CMPIStatus Ok = {CMPI_RC_OK, nullptr};
+    constexpr CMPIStatus ok = {CMPI_RC_OK, nullptr};
     const AssociationRequest request(served(), broker, function);
-    CMPIStatus status = Ok;
+    CMPIStatus status = ok;
     SensorFactory factory(true, false);
     const CMPIObjectPath* const target =
         SensorFactory::get_assoc_targetClass_ObjectPath(request.broker(), op,
             namedOrOwn(assocClass, SensorSystemDeviceClass), resultClass, &status);
     if (!isUsable(target)) {
         request.marks().exit();
-        return Ok; // another provider's source or association
+        return ok; // another provider's source or association
     }
     if (isOfClass(target, ComputerSystemClass, &status)) {
         if (!wants(resultClass, ComputerSystemClass, "CIM_ComputerSystem"))
-            return Ok; // without an exit mark
+            return ok; // without an exit mark
         if (!returnSystems(request, answer, ctx, rslt, target, &status)) {
-            request.marks().failure(UpcallFailed);
+            request.marks().failure(upcallFailed);
             return status; // without an exit mark
         }
     } else if (isOfClass(target, SensorClass, &status)) {
         if (!wants(resultClass, SensorClass, "CIM_NumericSensor"))
-            return Ok; // without an exit mark
+            return ok; // without an exit mark
         const FetchFailure failure =
             returnSensors(request, answer, rslt, op, properties, factory, &status);
         if (failure.text != nullptr)
@@ -120,7 +120,7 @@ FetchFailure fetchFarEnds(const AssociationRequest& request, const CMPIContext* 
                 farEnds.push_back(system);
             return true;
         });
-    return {isWhole ? nullptr : UpcallFailed, isWhole};
+    return {isWhole ? nullptr : upcallFailed, isWhole};
 }
 
 CMPIStatus references(const char* function, Answer answer, const CMPIContext* ctx,

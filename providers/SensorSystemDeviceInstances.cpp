@@ -6,8 +6,6 @@
 #include "providers/AssociationWalk.h"
 #include "providers/SensorSystemDevice.h"
 
-#include <cstdint>
-
 namespace Vorn::SensorProfileProvider {
 
 using namespace SystemDevice;
@@ -22,7 +20,7 @@ struct PairFailures {
     FailureTexts association;
 };
 
-constexpr PairFailures InstanceFailures = {
+constexpr PairFailures instanceFailures = {
     {"Create CMPIObjectPath            failed.",
         "Create CMPIObjectPath failed for             ComputerSystemClass.", nullptr},
     {"CMPIObjectPath is NULL for Sensor Provider", "CMPIObjectPath is NULL for Sensor Provider",
@@ -31,7 +29,7 @@ constexpr PairFailures InstanceFailures = {
         "Create CMPIObjectPath failed for                     HostedAccessPoint.", nullptr},
 };
 
-constexpr PairFailures NameFailures = {
+constexpr PairFailures nameFailures = {
     {"Create CMPIObjectPath failed.", "Create CMPIObjectPath failed for ComputerSystemClass.",
         nullptr},
     {"CMPIObjectPath is NULL for Sensor", "CMPIObjectPath is NULL for Sensor Class", nullptr},
@@ -88,9 +86,7 @@ private:
         std::vector<CMPIObjectPath*> sensors;
         if (!fetchSensors(sensors))
             return WalkEnd::atSensors;
-        const auto count = static_cast<std::uint16_t>(sensors.size());
-        for (std::uint16_t i = 0; i < count; ++i) {
-            const CMPIObjectPath* const sensor = sensors.at(i);
+        for (const CMPIObjectPath* const sensor : sensors) {
             if (!isUsable(sensor)) {
                 request().fail(failures_.sensor, status());
                 return WalkEnd::reported;
@@ -112,7 +108,7 @@ int sensorSystemDeviceCMPIInstances(const CMPIObjectPath* op, const char** prope
 {
     const AssociationRequest request(served(), broker, "sensorSystemDeviceCMPIInstances");
     CMPIStatus status = {CMPI_RC_OK, nullptr};
-    PairWalk walk(request, InstanceFailures, ctx, op, &status);
+    PairWalk walk(request, instanceFailures, ctx, op, &status);
     walk.reserve(out);
     const char* keys[] = {"GroupComponent", "PartComponent", nullptr};
     const WalkEnd end = walk.run([&](const CMPIObjectPath* association,
@@ -130,7 +126,7 @@ CMPIStatus SensorSystemDevice_EnumInstanceNames(
 {
     const AssociationRequest request(served(), broker, "SensorSystemDevice_EnumInstanceNames");
     CMPIStatus status = {CMPI_RC_OK, nullptr};
-    PairWalk walk(request, NameFailures, ctx, op, &status);
+    PairWalk walk(request, nameFailures, ctx, op, &status);
     const WalkEnd end =
         walk.run([&](const CMPIObjectPath* association, const References& references) {
             addReferenceKeys(association, references);
