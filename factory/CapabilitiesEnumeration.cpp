@@ -37,7 +37,7 @@ int SensorFactory::getOneSensorEnabledLogicalElementCapCMPIInstance(const CMPIBr
                 " properties=", properties, " instances=", &instances, " rc=", rc);
         });
     traced.entering(FactoryLines::getOneCapabilitiesInstance.entry);
-    const char* const instanceID = charactersOf(key, rc);
+    const char* const instanceID = charactersOf(key, nullptr); // an unknown key leaves rc as it is
     const auto found =
         instanceID ? sensorEnabledLogCapMap.find(instanceID) : sensorEnabledLogCapMap.end();
     if (found == sensorEnabledLogCapMap.end())

@@ -15,7 +15,7 @@ void returnAssociation(Answer answer, const CMPIResult* rslt, const CMPIObjectPa
         CMReturnInstance(rslt, association);
         return;
     }
-    const CMPIObjectPath* const path = CMGetObjectPath(association, status);
+    const CMPIObjectPath* const path = CMGetObjectPath(association, nullptr);
     if (!isUsable(path))
         return;
     copyNameSpace(path, op, status);

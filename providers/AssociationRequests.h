@@ -94,7 +94,7 @@ public:
         if (keyCountOf(op, &status) == 0)
             fail({noKeyPassed, noKeyPassed, noKeyPassed}, &status, line);
         else if (build(instances) == 0)
-            returnInstanceAt(rslt, op, instances, true, &status);
+            returnInstanceAt(rslt, op, instances, true, nullptr);
         marks_.exit(line);
         CMReturnDone(rslt);
         return status;

@@ -46,14 +46,13 @@ void returnPaths(const CMPIResult* rslt, const CMPIObjectPath* ref,
 void returnInstanceAt(const CMPIResult* rslt, const CMPIObjectPath* ref,
     const std::vector<CMPIInstance*>& instances, bool comparesReferences, CMPIStatus* status)
 {
-    for (const CMPIInstance* const instance : instances) {
-        if (!isUsable(instance))
-            continue;
-        if (isObjPathsEqual(CMGetObjectPath(instance, status), ref, comparesReferences)) {
-            CMReturnInstance(rslt, instance);
-            return;
-        }
-    }
+    const auto end = instances.begin() + static_cast<std::uint16_t>(instances.size());
+    const auto found = std::find_if(instances.begin(), end, [&](const CMPIInstance* instance) {
+        return isUsable(instance) &&
+               isObjPathsEqual(CMGetObjectPath(instance, status), ref, comparesReferences);
+    });
+    if (found != end)
+        CMReturnInstance(rslt, *found);
 }
 
 } // namespace Vorn::SensorProfileProvider

@@ -23,6 +23,14 @@ TEST(ProviderException, aCopyKeepsItsTextWhenTheSourceIsGone)
     EXPECT_STREQ(copy.what(), "Failed while setting Device ID");
 }
 
+TEST(ProviderException, keepsItsTextWhenTheCharactersItWasMadeFromAreOverwritten)
+{
+    char text[] = "Failed while setting Device ID";
+    const ProviderException exception(text);
+    text[0] = 'x';
+    EXPECT_STREQ(exception.what(), "Failed while setting Device ID");
+}
+
 TEST(ProviderException, theBaseClassesWhatGivesTheMessage)
 {
     const ProviderException exception("Failed while setting Health State");

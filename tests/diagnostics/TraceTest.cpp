@@ -7,6 +7,7 @@
 
 #include <gtest/gtest.h>
 
+#include <fstream>
 #include <thread>
 
 namespace {
@@ -54,19 +55,21 @@ TEST(Trace, aParameterListFollowsEachFormat)
         "MESSAGE [File: f, Line: 7]: t,Parameters List:  a=1");
     EXPECT_STREQ(tracepara("g", "f", 1, " a=1", static_cast<MessageType>(4)),
         "ENTERING: g() in f [Line: 1],Parameters List:  a=1");
+    EXPECT_STREQ(tracepara("g", "f", 1, nullptr, Entering),
+        "ENTERING: g() in f [Line: 1],Parameters List: (null)");
 }
 
 TEST(Trace, aLongLineIsCutAndTheRestOfAShorterOneIsCleared)
 {
     const std::string longText(2000, 'x');
     char* const line = trace(longText.c_str(), "f", 1, Message);
-    EXPECT_EQ(std::string(line).size(), TraceBufferSize - 1);
+    EXPECT_EQ(std::string(line).size(), 511U);
     EXPECT_EQ(trace("t", "f", 1, Message), line);
-    for (std::size_t i = std::string(line).size(); i < TraceBufferSize; ++i)
+    for (std::size_t i = std::string(line).size(); i < 512; ++i)
         ASSERT_EQ(line[i], '\0') << i;
 
     const char* const parameters = tracepara("t", "f", 1, longText.c_str(), Entering);
-    EXPECT_EQ(std::string(parameters).size(), TraceBufferSize - 1);
+    EXPECT_EQ(std::string(parameters).size(), 511U);
 }
 
 TEST(Trace, linesWithAndWithoutParametersHaveABufferEach)
@@ -117,6 +120,20 @@ TEST(Marks, theTraceChannelReceivesTheSameLinesAsTheLogChannel)
     for (LogLine& line : expected)
         line.channel = "trace";
     EXPECT_EQ(capture.trace(), expected);
+}
+
+TEST(Marks, theLogChannelReceivesALineBeforeTheTraceChannel)
+{
+    const Testing::TemporaryFolder folder;
+    const std::filesystem::path both = folder.path() / "both";
+    RynLog::configure({0, "file:" + both.string(), "file:" + both.string()});
+    traceMessage({Component, "F"}, "f", 2, "failed");
+    RynLog::configure({6000, "off", "off"});
+    std::ifstream lines(both);
+    std::vector<std::string> channels;
+    for (std::string time, channel, rest; lines >> time >> channel && std::getline(lines, rest);)
+        channels.push_back(channel);
+    EXPECT_EQ(channels, (std::vector<std::string>{"log", "trace"}));
 }
 
 TEST(TracedOperation, marksCarryTheParameterListAtLevel3000)

@@ -154,12 +154,12 @@ TEST_F(CapabilitiesEnumerationTest, anIdentifierIsNeitherFoldedNorTrimmed)
 TEST_F(CapabilitiesEnumerationTest, anUnknownIdentifierLeavesTheStatusAsItWas)
 {
     rc_ = {CMPI_RC_ERR_ACCESS_DENIED, nullptr};
-    std::vector<CMPIInstance*> none;
     EXPECT_EQ(factory_.getOneSensorEnabledLogicalElementCapCMPIInstance(
-                  broker(), path("C").handle(), nullptr, nullptr, none, &rc_),
+                  broker(), path("C").handle(), nullptr, nullptr, instances_, &rc_),
         1);
+    EXPECT_EQ(getOne("unknown"), 1);
     EXPECT_EQ(rc_.rc, CMPI_RC_ERR_ACCESS_DENIED);
-    EXPECT_TRUE(none.empty());
+    EXPECT_TRUE(instances_.empty());
 }
 
 TEST_F(NoCapabilitiesTest, areNotFoundByTheirIdentifier)
@@ -240,31 +240,6 @@ std::string traced(
            "() in SensorFactory [Line: " + number + "],Parameters List:  " + parameters;
 }
 
-TEST_F(CapabilitiesEnumerationTest, allInstancesAreTraced)
-{
-    const LogCapture capture;
-    getAll();
-    const std::string name = "getAllSensorEnabledLogicalElementCapCMPIInstances";
-    const std::string parameters =
-        "broker=PTR ref=PTR properties=0 isObjPath=0 instances=PTR rc=PTR";
-    EXPECT_THAT(linesOf(capture, name), ElementsAre(traced(name, "ENTERING", 996, parameters),
-                                            traced(name, "EXITING", 1017, parameters)));
-}
-
-TEST_F(CapabilitiesEnumerationTest, oneInstanceIsTracedAndItsBuilderDoesNotWantAPath)
-{
-    const LogCapture capture;
-    getOne(Identifier);
-    const std::string name = "getOneSensorEnabledLogicalElementCapCMPIInstance";
-    const std::string parameters = "broker=PTR ref=PTR key=PTR properties=0 instances=PTR rc=PTR";
-    EXPECT_THAT(linesOf(capture, name), ElementsAre(traced(name, "ENTERING", 1134, parameters),
-                                            traced(name, "EXITING", 1158, parameters)));
-    const std::vector<std::string> built =
-        linesOf(capture, "makeSensorEnabledLogicalElementCapInstance");
-    ASSERT_EQ(built.size(), 2U);
-    EXPECT_THAT(built[0], ::testing::HasSubstr(" IsObjPath=0 "));
-}
-
 TEST_F(CapabilitiesEnumerationTest, anUnknownIdentifierLeavesTheExitingLineOut)
 {
     const LogCapture capture;
@@ -277,15 +252,6 @@ TEST_F(CapabilitiesEnumerationTest, anUnknownIdentifierLeavesTheExitingLineOut)
 
 const std::string PathsOperation = "getAllSensorEnabledLogicalElementCapCMPIObjPaths";
 const std::string PathsParameters = "broker=PTR ref=PTR objectPaths=PTR status=PTR";
-
-TEST_F(CapabilitiesEnumerationTest, objectPathsAreTraced)
-{
-    const LogCapture capture;
-    getPaths();
-    EXPECT_THAT(linesOf(capture, PathsOperation),
-        ElementsAre(traced(PathsOperation, "ENTERING", 1041, PathsParameters),
-            traced(PathsOperation, "EXITING", 1093, PathsParameters)));
-}
 
 TEST_F(NoCapabilitiesTest, haveAnExitingLineOfTheirOwn)
 {

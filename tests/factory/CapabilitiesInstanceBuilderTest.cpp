@@ -217,25 +217,4 @@ TEST_F(CapabilitiesInstanceBuilderTest, withoutAStatusAMissingArrayIsToldToTheTr
     EXPECT_EQ(messages_.size(), 1U);
 }
 
-TEST_F(CapabilitiesInstanceBuilderTest, isTracedWithItsParameters)
-{
-    const LogCapture capture;
-    make();
-    make(nullptr, true);
-    const auto lines = [](const std::string& flag) {
-        const std::string parameters = ",Parameters List:  broker=PTR ref=PTR snsrCap=PTR "
-                                       "properties=0 IsObjPath=" +
-                                       flag + " rc=PTR";
-        const std::string name = "makeSensorEnabledLogicalElementCapInstance";
-        return std::vector<std::string>{name + "(SensorFactory:863) 3000 ENTERING: " + name +
-                                            "() in SensorFactory [Line: 863]" + parameters,
-            name + "(SensorFactory:965) 3000 EXITING: " + name + "() in SensorFactory [Line: 965]" +
-                parameters};
-    };
-    std::vector<std::string> expected = lines("0");
-    for (const std::string& line : lines("1"))
-        expected.push_back(line);
-    EXPECT_EQ(Testing::withoutPointers(capture.log()), expected);
-}
-
 } // namespace CapabilitiesInstanceBuilderTests

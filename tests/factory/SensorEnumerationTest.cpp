@@ -96,21 +96,25 @@ TEST_F(SensorEnumerationTest, oneInstanceIsFoundByItsWholeIdentifier)
     EXPECT_EQ(property(*Host::Instance::of(instances_[0]), "ElementName"), "string \"Y\"");
 }
 
-// Harvested one after the other: temperatures come before voltages.
+// Twenty, since sorting keeps the order of a few records even where it does not promise to.
 class DuplicateTest : public SensorEnumerationTest {
 protected:
-    DuplicateTest()
-        : SensorEnumerationTest({{NodeType::Voltage, "/same", "one", NodeReading{}},
-              {NodeType::Temperature, "/same", "one", NodeReading{}}})
+    DuplicateTest() : SensorEnumerationTest(duplicates()) {}
+
+    static std::vector<ScriptedNode> duplicates()
     {
+        std::vector<ScriptedNode> nodes(20, {NodeType::Temperature, "/same", "one", {}});
+        for (std::size_t i = 0; i < nodes.size(); ++i)
+            nodes[i].reading.reading = static_cast<double>(i);
+        return nodes;
     }
 };
 
-TEST_F(DuplicateTest, theLaterSensorOfOneIdentifierIsTheOnePublished)
+TEST_F(DuplicateTest, theLastSensorOfOneIdentifierIsTheOnePublished)
 {
     EXPECT_EQ(getOne("one:/same"), 0);
     ASSERT_EQ(instances_.size(), 1U);
-    EXPECT_EQ(property(*Host::Instance::of(instances_[0]), "SensorType"), "uint16 3");
+    EXPECT_EQ(property(*Host::Instance::of(instances_[0]), "CurrentReading"), "sint32 19");
 }
 
 // More sensors than a 16-bit count can say.
@@ -215,42 +219,11 @@ std::vector<std::string> linesOf(const LogCapture& capture, const std::string& f
     return found;
 }
 
-TEST_F(SensorEnumerationTest, allInstancesAreTracedWithAnUnseparatedLastLabel)
-{
-    const LogCapture capture;
-    factory_.getAllSensorCMPIInstances(
-        broker(), path("C").handle(), nullptr, false, instances_, &rc_);
-    const std::string parameters = ",Parameters List:  broker=PTR ref=PTR properties=0 isObjPath=0 "
-                                   "instances=PTRrc=PTR";
-    EXPECT_THAT(linesOf(capture, "getAllSensorCMPIInstances"),
-        ElementsAre("3000 ENTERING" + parameters, "3000 EXITING:" + parameters));
-}
-
-TEST_F(SensorEnumerationTest, oneInstanceIsTraced)
-{
-    const LogCapture capture;
-    getOne("X:/p");
-    const std::string parameters =
-        ",Parameters List:  broker=PTR ref=PTR key=PTR properties=0 instances=PTR rc=PTR";
-    EXPECT_THAT(linesOf(capture, "getOneSensorCMPIInstance"),
-        ElementsAre("3000 ENTERING" + parameters, "3000 EXITING:" + parameters));
-}
-
 TEST_F(SensorEnumerationTest, anUnknownIdentifierLeavesTheExitingLineOut)
 {
     const LogCapture capture;
     getOne("unknown");
     EXPECT_EQ(linesOf(capture, "getOneSensorCMPIInstance").size(), 1U);
-}
-
-TEST_F(SensorEnumerationTest, objectPathsAreTraced)
-{
-    const LogCapture capture;
-    factory_.getAllSensorCMPIObjPaths(broker(), path("C").handle(), paths_, &rc_);
-    const std::string parameters =
-        ",Parameters List:  broker=PTR ref=PTR objectPaths=PTR status=PTR";
-    EXPECT_THAT(linesOf(capture, "getAllSensorCMPIObjPaths"),
-        ElementsAre("3000 ENTERING" + parameters, "3000 EXITING:" + parameters));
 }
 
 TEST_F(EmptyMachineTest, hasItsObjectPathsTracedToo)

@@ -149,6 +149,13 @@ TEST_F(SensorInstanceBuilderTest, aThresholdThatScalesToZeroIsLeftOut)
     EXPECT_EQ(property(make(sensor), "UpperThresholdFatal"), "absent");
 }
 
+TEST_F(SensorInstanceBuilderTest, aNegativeThresholdIsPublished)
+{
+    Sensor sensor = fullSensor();
+    sensor.setLowerThresholdFatal(-0.5);
+    EXPECT_EQ(property(make(sensor), "LowerThresholdFatal"), "sint32 -500");
+}
+
 TEST_F(SensorInstanceBuilderTest, theStoredRecordIsUntouched)
 {
     Sensor sensor = fullSensor();
@@ -252,21 +259,6 @@ TEST_F(SensorInstanceBuilderTest, exactlyAFull16BitCountOfLabelsIsNoProperty)
     EXPECT_EQ(property(make(sensor), "PossibleStates"), "absent");
     sensor.setPossibleStates(std::vector<unsigned>(65536 - 12 + 2, 1));
     EXPECT_EQ(property(make(sensor), "PossibleStates"), "[string \"Normal\", string \"Normal\"]");
-}
-
-TEST_F(SensorInstanceBuilderTest, isTracedWithItsParameters)
-{
-    const LogCapture capture;
-    make(fullSensor());
-    const std::string parameters =
-        ",Parameters List:  broker=PTR ref=PTR snsr=PTR properties=0 isObjPath=0 rc=PTR";
-    EXPECT_THAT(Testing::withoutPointers(capture.log()),
-        ElementsAre("makeSensorInstance(SensorFactory:269) 3000 ENTERING: makeSensorInstance() in "
-                    "SensorFactory [Line: 269]" +
-                        parameters,
-            "makeSensorInstance(SensorFactory:737) 3000 EXITING: makeSensorInstance() in "
-            "SensorFactory [Line: 737]" +
-                parameters));
 }
 
 } // namespace SensorInstanceBuilderTests

@@ -27,7 +27,8 @@ TEST(CapabilitiesHarvest, reportsTheFailuresOwnTextWhenTheRecordCannotBeAppended
     ::testing::internal::CaptureStderr();
     bool failed = false;
     {
-        const Testing::FailingAllocation failing(2 * capabilities.size() * sizeof(SensorEnabledLogCap));
+        const Testing::FailingAllocation failing(
+            2 * capabilities.size() * sizeof(SensorEnabledLogCap));
         failed = getSensorEnabledLogCapInstances(capabilities);
     }
     EXPECT_EQ(::testing::internal::GetCapturedStderr(), "std::bad_alloc\n");

@@ -91,6 +91,19 @@ TEST(Harvest, thatFailsOutlivesAStandardErrorThatNobodyReads)
     EXPECT_TRUE(nothing);
 }
 
+TEST(NodeLexicon, numbersAreThoseOfTheHardwareModel)
+{
+    using Vorn::NodeLexicon::Properties;
+    EXPECT_THAT((std::vector{Tachometer, Voltage, Temperature}),
+        ElementsAre(NodeType{20}, NodeType{21}, NodeType{22}));
+    EXPECT_THAT(
+        (std::vector{Properties::Reading, Properties::UpperCritical, Properties::UpperNonCritical,
+            Properties::LowerCritical, Properties::LowerNonCritical, Properties::BaseUnits,
+            Properties::UpperFatal, Properties::LowerFatal, Properties::PossibleStates}),
+        ElementsAre(Properties{14}, Properties{22}, Properties{23}, Properties{32}, Properties{33},
+            Properties{62}, Properties{88}, Properties{103}, Properties{125}));
+}
+
 TEST(Harvest, goesThroughTemperaturesThenVoltagesThenTachometers)
 {
     const ScriptedMachine machine({node(Tachometer, "fan1"), node(Voltage, "in1"),

@@ -3,6 +3,7 @@
 // Every path that one request is answered with can be asked for in the next one.
 
 #include "tests/providers/AssociationTest.h"
+#include "tests/providers/ClosingSink.h"
 
 #include <gmock/gmock.h>
 
@@ -103,6 +104,38 @@ TEST_P(AssociationRoundTripTest, fromNamesAndInstancesToInstances)
     EXPECT_EQ(found.instances().size(), pairs);
     for (const Host::Instance* const instance : found.instances())
         expectFetched(instance->objectPath());
+}
+
+// Unlike the instance providers' requests.
+TEST_P(AssociationRoundTripTest, RequestsForInstancesEndWithTheirExitMarkBeforeTheResultIsClosed)
+{
+    const Host::ObjectPath& keyless = path(GetParam().association);
+    const Host::ObjectPath& keyed = path(GetParam().association, {{"Other", "x"}});
+    const CMPIInstanceMIFT& functions = *instanceMI_->ft;
+    using Request = std::function<void(const CMPIResult*)>;
+    for (const Request& request : {
+             Request([&](const CMPIResult* into) {
+                 functions.enumerateInstanceNames(instanceMI_, context(), into, keyless.handle());
+             }),
+             Request([&](const CMPIResult* into) {
+                 functions.enumerateInstances(
+                     instanceMI_, context(), into, keyless.handle(), nullptr);
+             }),
+             Request([&](const CMPIResult* into) {
+                 functions.getInstance(instanceMI_, context(), into, keyed.handle(), nullptr);
+             }),
+             Request([&](const CMPIResult* into) {
+                 functions.getInstance(instanceMI_, context(), into, keyless.handle(), nullptr);
+             }),
+         }) {
+        const LogCapture capture;
+        ClosingSink sink(capture);
+        Host::Result into(sink);
+        request(into.handle());
+        ASSERT_TRUE(sink.isDone());
+        EXPECT_TRUE(isExitMark(sink.linesBefore.back()));
+        EXPECT_EQ(sink.linesBefore, capture.log());
+    }
 }
 
 TEST_P(AssociationRoundTripTest, fromReferencesOfEitherEndToInstances)

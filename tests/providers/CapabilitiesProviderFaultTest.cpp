@@ -158,6 +158,14 @@ TEST_F(CapabilitiesProviderFaultTest, aKeyReportedMissingThroughTheStatusIsAbsen
     }
 }
 
+TEST_F(CapabilitiesProviderFaultTest, theFilterIsSetBeforeTheProperties)
+{
+    run(OneInstance, {BrokerCall::setPropertyFilter, 1, FaultManner::errorStatus});
+    const std::vector<BrokerCall>& calls = faulty_->calls();
+    EXPECT_LT(std::find(calls.begin(), calls.end(), BrokerCall::setPropertyFilter),
+        std::find(calls.begin(), calls.end(), BrokerCall::setProperty));
+}
+
 TEST_F(CapabilitiesProviderFaultTest, aPathThatCannotCountItsKeysHasNone)
 {
     const auto request = run(OneInstance, {BrokerCall::getKeyCount, 1, FaultManner::nullResult});

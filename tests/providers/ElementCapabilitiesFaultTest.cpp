@@ -228,6 +228,32 @@ TEST_F(ElementCapabilitiesFaultTest, anInstanceThatCannotBeMadeIsPassedOverInASe
     }
 }
 
+TEST_F(ElementCapabilitiesFaultTest, anAssociatorThatCannotBeMadeIsPassedOnAsItIs)
+{
+    for (const FaultManner manner : Undelivered)
+        for (const auto* const kinds : {FromSensor, FromCapabilities}) {
+            const auto request = run(kinds[Associators], {BrokerCall::newInstance, 1, manner});
+            EXPECT_EQ(request->status.rc, CMPI_RC_OK);
+            EXPECT_EQ(request->answer.refused(), 1U);
+        }
+}
+
+// The status of the request is not handed over where an instance is asked for its path.
+TEST_F(ElementCapabilitiesFaultTest, aPathThatIsNotToldLeavesTheStatus)
+{
+    const Fault fault = {BrokerCall::getObjectPath, 1, FaultManner::errorStatus};
+    for (const RequestKind& kind : {OneInstance, FromCapabilities[ReferenceNames]})
+        EXPECT_EQ(run(kind, fault)->status.rc, CMPI_RC_OK) << kind;
+}
+
+TEST_F(ElementCapabilitiesFaultTest, theFilterIsSetBeforeTheReferences)
+{
+    run(Instances, {BrokerCall::setPropertyFilter, 1, FaultManner::errorStatus});
+    const std::vector<BrokerCall>& calls = faulty_->calls();
+    EXPECT_LT(std::find(calls.begin(), calls.end(), BrokerCall::setPropertyFilter),
+        std::find(calls.begin(), calls.end(), BrokerCall::setProperty));
+}
+
 TEST_F(ElementCapabilitiesFaultTest, aPathThatCannotCountItsKeysHasNone)
 {
     const auto request = run(OneInstance, {BrokerCall::getKeyCount, 1, FaultManner::nullResult});
@@ -283,9 +309,13 @@ TEST_F(ElementCapabilitiesFaultTest, withoutAnAssociationPathThereAreNoReference
 {
     for (const FaultManner manner : Undelivered)
         for (const Which which : {References, ReferenceNames}) {
-            const auto request =
-                run(FromSensor[which], {BrokerCall::newObjectPath, 2, manner, CMPI_RC_ERR_FAILED});
+            const auto [request, lines] = runTraced(
+                FromSensor[which], {BrokerCall::newObjectPath, 2, manner, CMPI_RC_ERR_FAILED});
             EXPECT_EQ(request->status.rc, CMPI_RC_ERR_FAILED); // as the broker left it
+            const HandlerLines expected =
+                handler(which == References ? "SensorElementCapabilities_References"
+                                            : "SensorElementCapabilities_ReferenceNames");
+            EXPECT_EQ(lines, sequence({expected.entry(), expected.exit()}));
             EXPECT_THAT(request->answer.paths(), IsEmpty());
             EXPECT_THAT(request->answer.instances(), IsEmpty());
             EXPECT_EQ(request->answer.refused(), 0U);

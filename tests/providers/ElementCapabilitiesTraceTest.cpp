@@ -133,12 +133,17 @@ TEST_F(ElementCapabilitiesTraceTest, ofTheNamesOfAssociators)
 
 TEST_F(ElementCapabilitiesTraceTest, ofATargetThatNobodyHereLeadsTo)
 {
-    const HandlerLines lines = handler("SensorElementCapabilities_AssociatorNames");
     const Host::ObjectPath& source = sensor("B:/2");
     const char* const other = "ZUMLO_SensorSystemDevice";
+    const auto expected = [&](const std::string& function) {
+        const HandlerLines lines = handler(function);
+        return sequence(
+            {lines.entry(), Built, counted(), lookedUp(other, "(null)", 1221), lines.exit()});
+    };
+    EXPECT_THAT(traceOf([&] { associators(source, {.associationClass = other}); }),
+        ElementsAreArray(expected("SensorElementCapabilities_Associators")));
     EXPECT_THAT(traceOf([&] { associatorNames(source, {.associationClass = other}); }),
-        ElementsAreArray(sequence(
-            {lines.entry(), Built, counted(), lookedUp(other, "(null)", 1221), lines.exit()})));
+        ElementsAreArray(expected("SensorElementCapabilities_AssociatorNames")));
 }
 
 TEST_F(ElementCapabilitiesTraceTest, ofReferences)

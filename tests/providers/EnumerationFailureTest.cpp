@@ -2,6 +2,7 @@
 
 // Requests whose factory fails to enumerate instances.
 
+#include "tests/providers/AssociationTest.h"
 #include "tests/providers/Factories.h"
 #include "tests/providers/FailingEnumerations.h"
 #include "tests/providers/RequestTrace.h"
@@ -100,6 +101,77 @@ TEST_F(EnumerationFailureTest, endsTheSearchForCapabilities)
         ElementsAreArray(sequence({lines.entry(191), builtFactory({"_createSensorMap"}),
             lines.failure(CapabilitiesFailed, 243), lines.exit(245)})));
     expectGivenUp();
+}
+
+// ---- Associations ----
+
+class FailingAssociationTest : public AssociationTest {
+protected:
+    using InstanceFactory = CMPIInstanceMI* (*)(const CMPIBroker*, const CMPIContext*, CMPIStatus*);
+    using AssociationFactory = CMPIAssociationMI* (*)(const CMPIBroker*, const CMPIContext*,
+        CMPIStatus*);
+
+    FailingAssociationTest(InstanceFactory instances, AssociationFactory associations)
+        : AssociationTest(instances, associations, {ThreeSensors[0]}, {"host"})
+    {
+    }
+
+    // That the association's provider gives up, with the text that both failures have.
+    void expectGivenUp(const Host::ObjectPath& source, const HandlerLines& handler)
+    {
+        CMPIStatus status = {CMPI_RC_OK, nullptr};
+        EXPECT_THAT(ownLines(traceOf([&] { status = associators(source); })),
+            ElementsAreArray(
+                sequence({handler.entry(), handler.failure(SensorsFailed), handler.exit()})));
+        EXPECT_EQ(status.rc, FailedEnumeration);
+        expectNothing(false);
+    }
+};
+
+class FailingElementCapabilitiesTest : public FailingAssociationTest {
+protected:
+    FailingElementCapabilitiesTest()
+        : FailingAssociationTest(SensorElementCapabilitiesProvider_Create_InstanceMI,
+              SensorElementCapabilitiesProvider_Create_AssociationMI)
+    {
+    }
+};
+
+class FailingSystemDeviceTest : public FailingAssociationTest {
+protected:
+    FailingSystemDeviceTest()
+        : FailingAssociationTest(SensorSystemDeviceProvider_Create_InstanceMI,
+              SensorSystemDeviceProvider_Create_AssociationMI)
+    {
+    }
+};
+
+TEST_F(FailingElementCapabilitiesTest, EndsTheAssociatorsOfEitherEnd)
+{
+    const HandlerLines handler = {"SensorElementCapabilities", "SensorElementCapabilitiesProvider",
+        "SensorElementCapabilities_Associators"};
+    expectGivenUp(capabilities(), handler);
+    expectGivenUp(sensor("A"), handler);
+}
+
+TEST_F(FailingSystemDeviceTest, EndsTheAssociatorsOfASystem)
+{
+    expectGivenUp(system("host"), {"SenosrSystemDeviceProvider", "SensorSystemDeviceProvider",
+                                      "SensorSystemDevice_Associators"});
+}
+
+const auto AllPairsInOrder = ::testing::ElementsAre("A 1", "A 2", "B 1", "B 2");
+
+TEST_F(FailingElementCapabilitiesTest, NamesAreOrderedByCapabilitiesInsideSensors)
+{
+    expectOk(enumerateNames(path("ZUMLO_SensorElementCapabilities")));
+    EXPECT_THAT(pairs("ManagedElement", "Capabilities"), AllPairsInOrder);
+}
+
+TEST_F(FailingElementCapabilitiesTest, InstancesAreOrderedByCapabilitiesInsideSensors)
+{
+    expectOk(enumerate(path("ZUMLO_SensorElementCapabilities")));
+    EXPECT_THAT(pairs("ManagedElement", "Capabilities"), AllPairsInOrder);
 }
 
 } // namespace EnumerationFailureTests

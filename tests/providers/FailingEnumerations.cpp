@@ -1,9 +1,15 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Enumerations of instances that fail, in place of the factory's own, which never do.
+// Enumerations that fail or find more than one capabilities instance, in place of the factory's
+// own, which never do.
 
 #include "tests/providers/FailingEnumerations.h"
+
+#include "factory/BrokerCalls.h"
+#include "factory/ClassNames.h"
 #include "factory/SensorFactory.h"
+
+#include <array>
 
 namespace Vorn::SensorProfileProvider {
 
@@ -31,7 +37,21 @@ int SensorFactory::getAllSensorEnabledLogicalElementCapCMPIInstances(const CMPIB
     return fail(instances, rc);
 }
 
-// What else those files of the factory hold; the tests do not ask for it.
+// What else those files of the factory hold. Of paths there are two for each class.
+
+namespace {
+
+int addPaths(const CMPIBroker* broker, const CMPIObjectPath* ref, const char* className,
+    const char* key, const std::array<const char*, 2>& names, std::vector<CMPIObjectPath*>& paths)
+{
+    for (const char* const name : names) {
+        paths.push_back(newPath(broker, ref, className, nullptr));
+        addTextKey(paths.back(), key, name);
+    }
+    return 0;
+}
+
+} // namespace
 
 int SensorFactory::getOneSensorCMPIInstance(const CMPIBroker*, const CMPIObjectPath*, CMPIString*,
     const char**, std::vector<CMPIInstance*>&, CMPIStatus*)
@@ -39,10 +59,10 @@ int SensorFactory::getOneSensorCMPIInstance(const CMPIBroker*, const CMPIObjectP
     return 1;
 }
 
-int SensorFactory::getAllSensorCMPIObjPaths(
-    const CMPIBroker*, const CMPIObjectPath*, std::vector<CMPIObjectPath*>&, CMPIStatus*)
+int SensorFactory::getAllSensorCMPIObjPaths(const CMPIBroker* broker, const CMPIObjectPath* ref,
+    std::vector<CMPIObjectPath*>& paths, CMPIStatus*)
 {
-    return 1;
+    return addPaths(broker, ref, SensorClass, "DeviceID", {"A", "B"}, paths);
 }
 
 int SensorFactory::getOneSensorEnabledLogicalElementCapCMPIInstance(const CMPIBroker*,
@@ -51,10 +71,11 @@ int SensorFactory::getOneSensorEnabledLogicalElementCapCMPIInstance(const CMPIBr
     return 1;
 }
 
-int SensorFactory::getAllSensorEnabledLogicalElementCapCMPIObjPaths(
-    const CMPIBroker*, const CMPIObjectPath*, std::vector<CMPIObjectPath*>&, CMPIStatus*)
+int SensorFactory::getAllSensorEnabledLogicalElementCapCMPIObjPaths(const CMPIBroker* broker,
+    const CMPIObjectPath* ref, std::vector<CMPIObjectPath*>& paths, CMPIStatus*)
 {
-    return 1;
+    return addPaths(
+        broker, ref, SensorEnabledLogicalElementCapClass, "InstanceID", {"1", "2"}, paths);
 }
 
 } // namespace Vorn::SensorProfileProvider

@@ -45,6 +45,61 @@ protected:
     }
 };
 
+// 256 sensors in each of 257 systems: 65,792 pairs, of which a 16-bit count says 256.
+class SystemDeviceOfManyPairsTest : public AssociationTest {
+protected:
+    SystemDeviceOfManyPairsTest()
+        : AssociationTest(SensorSystemDeviceProvider_Create_InstanceMI,
+              SensorSystemDeviceProvider_Create_AssociationMI, sensors(256), systems(257))
+    {
+    }
+
+    static std::vector<std::string> systems(std::size_t count)
+    {
+        std::vector<std::string> names;
+        for (std::size_t i = 0; i < count; ++i)
+            names.push_back("S" + std::to_string(i));
+        return names;
+    }
+
+    void getPair(const std::string& systemName, const std::string& deviceID)
+    {
+        Host::ObjectPath& ref = path(SystemDevice);
+        ref.addKey("GroupComponent", Host::Value::of(system(systemName)));
+        ref.addKey("PartComponent", Host::Value::of(sensor(deviceID)));
+        expectOk(get(ref));
+    }
+};
+
+TEST_F(SystemDeviceOfManyPairsTest, AsManyInstancesAreEnumeratedAsTheCountSays)
+{
+    expectOk(enumerate(path(SystemDevice)));
+    EXPECT_EQ(answer_.instances().size(), 256U);
+}
+
+TEST_F(SystemDeviceOfManyPairsTest, AllNamesAreEnumerated)
+{
+    expectOk(enumerateNames(path(SystemDevice)));
+    EXPECT_EQ(answer_.paths().size(), 65792U);
+}
+
+TEST_F(SystemDeviceOfManyPairsTest, AnInstanceIsFoundAmongAsManyAsTheCountSays)
+{
+    getPair("S0", "F:/100255");
+    EXPECT_EQ(answer_.instances().size(), 1U);
+    getPair("S1", "F:/100000");
+    EXPECT_EQ(answer_.instances().size(), 1U);
+}
+
+TEST_F(SystemDeviceOfManyPairsTest, ASensorHasAsManyReferencesAsTheCountOfItsSystemsSays)
+{
+    systems_.names = systems(65537);
+    expectOk(references(sensor("F:/100000")));
+    EXPECT_EQ(answer_.instances().size(), 1U);
+    expectOk(associatorNames(sensor("F:/100000"))); // handed over as they come
+    EXPECT_EQ(answer_.paths().size(), 65537U);
+}
+
 TEST_F(ElementCapabilitiesOf65536SensorsTest, thereAreNoPairs)
 {
     expectOk(enumerateNames(path(ElementCapabilities)));

@@ -3,6 +3,7 @@
 // How requests of ZUMLO_NumericSensor end: found by the whole path, closed before they are left,
 // or thrown out of.
 
+#include "tests/providers/ClosingSink.h"
 #include "tests/providers/Factories.h"
 #include "tests/support/FaultyBroker.h"
 #include "tests/support/ProviderTest.h"
@@ -15,9 +16,11 @@
 namespace SensorProviderAnswerTests {
 
 using Testing::BrokerCall;
+using Testing::ClosingSink;
 using ::testing::Contains;
 using ::testing::ElementsAre;
 using Testing::FaultManner;
+using Testing::isExitMark;
 using Testing::LogCapture;
 using Testing::LogLine;
 using ::testing::Not;
@@ -118,28 +121,6 @@ TEST_F(SearchTest, noInstanceIsFoundByThePathOfNone)
 }
 
 // ---- Closed before they are left ----
-
-bool isExitMark(const LogLine& line)
-{
-    return line.function == "markProviderExit";
-}
-
-// Looks at the log at the moment in which the result is closed.
-class ClosingSink : public Host::CollectedResult {
-public:
-    explicit ClosingSink(const LogCapture& capture) : capture_(capture) {}
-
-    void done() override
-    {
-        Host::CollectedResult::done();
-        linesBefore = capture_.log();
-    }
-
-    std::vector<LogLine> linesBefore;
-
-private:
-    const LogCapture& capture_;
-};
 
 TEST_F(SensorProviderAnswerTest, theResultIsClosedBetweenTheMarks)
 {

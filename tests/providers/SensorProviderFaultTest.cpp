@@ -259,11 +259,22 @@ TEST_P(ArrayFailureTest, inAnEnumerationLeavesTheOtherInstancesWhole)
     EXPECT_TRUE(request->answer.isDone());
 }
 
+TEST_F(SensorProviderFaultTest, theStatusThatTheBrokerLeftIsReturned)
+{
+    const char* properties[] = {"PossibleStates", nullptr};
+    const auto request = run(Operation::oneInstance,
+        {BrokerCall::newArray, PossibleStates, FaultManner::nullResult, CMPI_RC_ERR_ACCESS_DENIED},
+        properties);
+    EXPECT_EQ(request->status.rc, CMPI_RC_ERR_ACCESS_DENIED);
+    EXPECT_EQ(request->status.msg, nullptr);
+}
+
 TEST_F(SensorProviderFaultTest, aLabelThatCannotBeMadeIsAnEmptyElement)
 {
-    for (const FaultManner manner :
-        {FaultManner::nullResult, FaultManner::handleless, FaultManner::errorStatus}) {
-        const auto request = run(Operation::oneInstance, {BrokerCall::newString, 2, manner});
+    for (const auto& [manner, code] : std::initializer_list<std::pair<FaultManner, CMPIrc>>{
+             {FaultManner::nullResult, CMPI_RC_OK}, {FaultManner::handleless, CMPI_RC_OK},
+             {FaultManner::errorStatus, CMPI_RC_ERR_FAILED}}) {
+        const auto request = run(Operation::oneInstance, {BrokerCall::newString, 2, manner, code});
         ASSERT_EQ(request->answer.instances().size(), 1U);
         const Host::Array& states =
             *request->answer.instances()[0]->property("PossibleStates")->array();
@@ -296,6 +307,22 @@ TEST_F(SensorProviderFaultTest, settingsThatFailAreIgnored)
         EXPECT_EQ(request->status.rc, CMPI_RC_OK) << Testing::nameOf(call);
         EXPECT_EQ(request->answer.instances().size(), 1U) << Testing::nameOf(call);
     }
+}
+
+// A broker may forget the namespace that a path was made with.
+TEST_F(SensorProviderFaultTest, everyNameIsGivenItsNamespaceOnceMoreBeforeItIsReturned)
+{
+    run(Operation::names, {BrokerCall::setNameSpace, 4, FaultManner::errorStatus});
+    EXPECT_EQ(faulty_->count(BrokerCall::setNameSpace), 4U); // two for each sensor
+}
+
+// A broker drops what the filter leaves out when it is set.
+TEST_F(SensorProviderFaultTest, theFilterIsSetBeforeTheProperties)
+{
+    run(Operation::oneInstance, {BrokerCall::setPropertyFilter, 1, FaultManner::errorStatus});
+    const std::vector<BrokerCall>& calls = faulty_->calls();
+    EXPECT_LT(std::find(calls.begin(), calls.end(), BrokerCall::setPropertyFilter),
+        std::find(calls.begin(), calls.end(), BrokerCall::setProperty));
 }
 
 // ---- Keys ----

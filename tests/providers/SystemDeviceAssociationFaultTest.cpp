@@ -103,11 +103,30 @@ TEST_F(SystemDeviceAssociationFaultTest, withoutAnAssociationPathThereAreNoRefer
 {
     for (const auto* const kinds : {FromSensor, FromSystem})
         for (const Which which : {References, ReferenceNames}) {
-            const auto request =
-                run(kinds[which], {BrokerCall::newObjectPath, 2, FaultManner::nullResult});
+            const Fault fault = {BrokerCall::newObjectPath, 2, FaultManner::nullResult};
+            const auto [request, lines] = runTraced(kinds[which], fault);
             EXPECT_EQ(request->status.rc, CMPI_RC_ERR_FAILED); // as the broker left it
             EXPECT_EQ(countOf(*request), 0U);
+            const HandlerLines expected = handler(Requests[which]);
+            EXPECT_EQ(lines, sequence({expected.entry(), expected.exit()}));
         }
+}
+
+TEST_F(SystemDeviceAssociationFaultTest, anAssociatorThatCannotBeMadeIsPassedOnAsItIs)
+{
+    for (const FaultManner manner : Undelivered) {
+        const auto request = run(FromSystem[Associators], {BrokerCall::newInstance, 1, manner});
+        EXPECT_EQ(request->status.rc, CMPI_RC_OK);
+        EXPECT_EQ(request->answer.refused(), 1U);
+    }
+}
+
+// The status of the request is not handed over where an instance is asked for its path.
+TEST_F(SystemDeviceAssociationFaultTest, aPathThatIsNotToldLeavesTheStatus)
+{
+    const Fault fault = {BrokerCall::getObjectPath, 1, FaultManner::errorStatus};
+    for (const RequestKind& kind : {OneInstance, FromSystem[ReferenceNames]})
+        EXPECT_EQ(run(kind, fault)->status.rc, CMPI_RC_OK) << kind;
 }
 
 TEST_F(SystemDeviceAssociationFaultTest, anAbsentEnumerationHasNoFarEnds)

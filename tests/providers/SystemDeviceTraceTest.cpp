@@ -182,6 +182,20 @@ TEST_F(SystemDeviceTraceTest, ofASourceWithoutTarget)
     }
 }
 
+TEST_F(SystemDeviceTraceTest, ofATargetThatNobodyHereLeadsTo)
+{
+    const Host::ObjectPath& source = sensor("B:/2");
+    const char* const other = "ZUMLO_SensorElementCapabilities";
+    const auto expected = [&](const std::string& name) {
+        return sequence(
+            {request(name).entry(), Built, lookedUp(other, "(null)", 1236), request(name).exit()});
+    };
+    EXPECT_THAT(traceOf([&] { associators(source, {.associationClass = other}); }),
+        ElementsAreArray(expected("Associators")));
+    EXPECT_THAT(traceOf([&] { associatorNames(source, {.associationClass = other}); }),
+        ElementsAreArray(expected("AssociatorNames")));
+}
+
 TEST_F(SystemDeviceEmptyTraceTest, ofSensorsThatAreNotThere)
 {
     const Host::ObjectPath& source = system("host");
