@@ -69,7 +69,7 @@ TEST(Harvest, namesASensorByThePrintableFormOfItsPath)
     std::vector<Sensor> sensors;
     EXPECT_FALSE(getSensorInstances(sensors));
     ASSERT_EQ(sensors.size(), 1U);
-    EXPECT_EQ(sensors[0].getDeviceID(), "CPU:/a\\x0a\xEF\xBF\xBD");
+    EXPECT_EQ(sensors[0].getDeviceID(), "CPU:/a\\n\xEF\xBF\xBD");
 }
 
 } // namespace
