@@ -11,8 +11,8 @@
 
 namespace Host::CimXml {
 
-// CLASS, with the selected properties and methods in the order of the declaration. A property's
-// or a method's inheritance is told by PROPAGATED.
+// Appends CLASS with the selected properties in the order of the declaration. An inherited one is
+// marked PROPAGATED.
 void writeClass(
     std::string& out, const ClassDeclaration& declared, const PropertySelection& selection);
 

@@ -41,8 +41,6 @@ std::size_t writeFrame(std::string& out, std::string_view name, CMPIType valueTy
         element.attribute("TYPE", nameOf(type));
     else if (property != nullptr && !property->referenceClass.empty())
         element.attribute("REFERENCECLASS", property->referenceClass);
-    if (property != nullptr && property->arraySize && isArrayType(type))
-        element.attribute("ARRAYSIZE", std::to_string(*property->arraySize));
     if (selection.includeClassOrigin && property != nullptr) {
         element.attribute("CLASSORIGIN", property->origin->name);
         if (property->declaredIn != declared)

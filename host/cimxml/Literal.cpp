@@ -7,7 +7,7 @@
 #include "host/broker/Refusal.h"
 #include "host/broker/Types.h"
 #include "host/cimxml/Characters.h"
-#include "host/repository/Words.h"
+#include "host/repository/TypeNames.h"
 #include "platform/text/Trim.h"
 #include "platform/text/Utf8.h"
 

@@ -8,8 +8,8 @@
 #include "host/cimxml/Message.h"
 #include "host/cimxml/OperationTable.h"
 #include "host/cimxml/PathReader.h"
-#include "host/repository/MofError.h"
-#include "host/repository/Words.h"
+#include "host/cimxml/Quotation.h"
+#include "host/repository/TypeNames.h"
 
 #include <array>
 

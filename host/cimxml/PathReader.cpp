@@ -7,8 +7,8 @@
 #include "host/broker/Refusal.h"
 #include "host/cimxml/InvalidParameter.h"
 #include "host/cimxml/Literal.h"
-#include "host/repository/MofError.h"
-#include "host/repository/Words.h"
+#include "host/cimxml/Quotation.h"
+#include "host/repository/TypeNames.h"
 
 #include <algorithm>
 
@@ -45,10 +45,10 @@ const std::string& onlyKeyOf(const ClassDeclaration* declared, const ObjectPath&
     if (declared == nullptr)
         throw Refusal(CMPI_RC_ERR_INVALID_CLASS,
             "class " + quotation(path.className()) + " is not known, so its key has no name");
-    if (declared->keys->size() != 1)
+    if (declared->keys.size() != 1)
         refuse("a key without name, but class " + declared->name + " has " +
-               std::to_string(declared->keys->size()) + " keys");
-    return declared->keys->front();
+               std::to_string(declared->keys.size()) + " keys");
+    return declared->keys.front();
 }
 
 } // namespace

@@ -27,12 +27,6 @@ bool isSelected(const PropertySelection& selection, const ClassDeclaration* decl
     return property == nullptr || property->declaredIn == declared;
 }
 
-bool isSelected(const PropertySelection& selection, const ClassDeclaration& declared,
-    const MethodDeclaration& method)
-{
-    return !selection.localOnly || method.declaredIn == &declared;
-}
-
 bool isSelected(const PropertySelection& selection, const Qualifier& qualifier)
 {
     return selection.includeQualifiers && (!selection.localOnly || !qualifier.isPropagated);

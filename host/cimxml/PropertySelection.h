@@ -11,7 +11,6 @@
 
 namespace Host {
 struct ClassDeclaration;
-struct MethodDeclaration;
 struct PropertyDeclaration;
 struct Qualifier;
 } // namespace Host
@@ -34,11 +33,7 @@ bool isListed(const PropertySelection& selection, std::string_view propertyName)
 bool isSelected(const PropertySelection& selection, const ClassDeclaration* declared,
     std::string_view propertyName);
 
-// Property lists say nothing of methods.
-bool isSelected(const PropertySelection& selection, const ClassDeclaration& declared,
-    const MethodDeclaration& method);
-
-// Of a class or a feature. Local are those that it carries itself.
+// Of a class or a property. Local are those that it carries itself.
 bool isSelected(const PropertySelection& selection, const Qualifier& qualifier);
 
 } // namespace Host::CimXml

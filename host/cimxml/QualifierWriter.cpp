@@ -23,7 +23,7 @@ constexpr std::array<std::pair<Scope, const char*>, 7> scopeAttributes = {{
     {Scope::indication, "INDICATION"},
 }};
 
-void writeScalar(std::string& out, const Scalar& value, CMPIType type)
+void writeScalar(std::string& out, const Scalar& value)
 {
     const Markup element(out, "VALUE");
     if (const auto* const text = std::get_if<std::string>(&value))
@@ -32,10 +32,8 @@ void writeScalar(std::string& out, const Scalar& value, CMPIType type)
         appendLiteral(out, Value::boolean(*truth));
     else if (const auto* const number = std::get_if<std::int64_t>(&value))
         out += std::to_string(*number);
-    else if (const auto* const magnitude = std::get_if<std::uint64_t>(&value))
-        appendLiteral(out, Value::integer(type, *magnitude));
     else
-        appendLiteral(out, Value::real(type, std::get<double>(value)));
+        out += std::to_string(std::get<std::uint64_t>(value));
 }
 
 void writeFlavor(Markup& element, const Flavor& flavor)
@@ -73,18 +71,18 @@ void writeEmbeddedObject(Markup& element, const QualifierList& qualifiers)
         element.attribute("EmbeddedObject", "object");
 }
 
-void writeConstant(std::string& out, const Constant& value, CMPIType type)
+void writeConstant(std::string& out, const Constant& value)
 {
     if (isNull(value))
         return;
     if (const Scalar* const scalar = std::get_if<Scalar>(&value)) {
-        writeScalar(out, *scalar, type);
+        writeScalar(out, *scalar);
         return;
     }
     const Markup element(out, "VALUE.ARRAY");
     for (const Scalar& each : std::get<std::vector<Scalar>>(value))
         if (!isNull(each))
-            writeScalar(out, each, elementType(type));
+            writeScalar(out, each);
 }
 
 void writeQualifiers(
@@ -98,8 +96,8 @@ void writeQualifiers(
         element.attribute("NAME", qualifier.name()).attribute("TYPE", nameOf(type));
         if (qualifier.isPropagated)
             element.attribute("PROPAGATED", "true");
-        writeFlavor(element, qualifier.flavor);
-        writeConstant(out, *qualifier.value, type);
+        writeFlavor(element, qualifier.flavor());
+        writeConstant(out, qualifier.value);
     }
 }
 
@@ -108,11 +106,9 @@ void writeQualifierDeclaration(std::string& out, const QualifierDeclaration& dec
     Markup element(out, "QUALIFIER.DECLARATION");
     element.attribute("NAME", declared.name).attribute("TYPE", nameOf(declared.type));
     element.attribute("ISARRAY", isArrayType(declared.type) ? "true" : "false");
-    if (declared.arraySize)
-        element.attribute("ARRAYSIZE", std::to_string(*declared.arraySize));
     writeFlavor(element, declared.flavor);
     writeScopes(out, declared.scopes);
-    writeConstant(out, declared.defaultValue, declared.type);
+    writeConstant(out, declared.defaultValue);
 }
 
 } // namespace Host::CimXml

@@ -21,7 +21,7 @@ std::string_view elementNameFor(CMPIType propertyType);
 void writeEmbeddedObject(Markup& element, const QualifierList& qualifiers);
 
 // VALUE or VALUE.ARRAY; nothing for a null. Nulls in a list are left out.
-void writeConstant(std::string& out, const Constant& value, CMPIType type);
+void writeConstant(std::string& out, const Constant& value);
 
 // A QUALIFIER for each that is selected. Flavors that are as usual are not written.
 void writeQualifiers(

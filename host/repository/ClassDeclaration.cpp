@@ -6,27 +6,12 @@
 
 namespace Host {
 
-namespace {
-
-template <typename List>
-auto findNamed(const List& list, std::string_view name) -> decltype(list.front().get())
-{
-    for (const auto& each : list)
-        if (equalNames(each->name, name))
-            return each.get();
-    return nullptr;
-}
-
-} // namespace
-
 const PropertyDeclaration* ClassDeclaration::property(std::string_view propertyName) const
 {
-    return findNamed(properties, propertyName);
-}
-
-const MethodDeclaration* ClassDeclaration::method(std::string_view methodName) const
-{
-    return findNamed(methods, methodName);
+    for (const auto& each : properties)
+        if (equalNames(each->name, propertyName))
+            return each.get();
+    return nullptr;
 }
 
 bool ClassDeclaration::isDerivedFrom(std::string_view ancestor) const

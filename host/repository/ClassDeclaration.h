@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// A class with all it inherits, as a repository answers it.
+// A class with all it inherits, as a repository returns it.
 
 #pragma once
 
@@ -20,59 +20,31 @@ struct ClassDeclaration;
 // A property, or a reference when its type is CMPI_ref.
 struct PropertyDeclaration {
     std::string name;
-    CMPIType type = CMPI_null; // with CMPI_ARRAY for an array
-    std::optional<std::uint32_t> arraySize;
-    std::string referenceClass;                   // of a reference
-    std::shared_ptr<const Constant> defaultValue; // never null; a null constant when none is given
+    CMPIType type = CMPI_null;  // with CMPI_ARRAY for an array
+    std::string referenceClass; // of a reference
+    Constant defaultValue;      // null when none is given
     QualifierList qualifiers;
     bool isKey = false;
     const ClassDeclaration* origin = nullptr;     // the class that introduced it
     const ClassDeclaration* declaredIn = nullptr; // the class that declared it last
-    SourcePosition position;
 
     bool isReference() const noexcept { return type == CMPI_ref; }
 };
 
-struct ParameterDeclaration {
-    std::string name;
-    CMPIType type = CMPI_null;
-    std::optional<std::uint32_t> arraySize;
-    std::string referenceClass; // of a reference or an array of references
-    QualifierList qualifiers;
-};
-
-struct MethodDeclaration {
-    std::string name;
-    CMPIType type = CMPI_null; // of what it returns
-    std::string referenceClass;
-    std::vector<ParameterDeclaration> parameters;
-    QualifierList qualifiers;
-    const ClassDeclaration* origin = nullptr;
-    const ClassDeclaration* declaredIn = nullptr;
-    SourcePosition position;
-};
-
-// Properties and methods come in the order of their introduction, those of ancestors first; one
-// that a subclass declares anew keeps its place. Declarations that a subclass takes over
-// unchanged are the same objects there, unless they carry qualifiers that end with their class.
+// Properties come in the order of their introduction, those of ancestors first; one that a
+// subclass overrides keeps its place. A subclass shares the declarations that it inherits
+// unchanged, unless they carry qualifiers that are not inherited.
 struct ClassDeclaration {
     std::string name;
     const ClassDeclaration* superclass = nullptr; // null at the root
     std::vector<const ClassDeclaration*> subclasses;
     QualifierList qualifiers;
     std::vector<std::shared_ptr<const PropertyDeclaration>> properties;
-    std::vector<std::shared_ptr<const MethodDeclaration>> methods;
-    // The names of the key properties, in the order of the class that declares them. Never
-    // null; shared by the subclasses.
-    std::shared_ptr<const std::vector<std::string>> keys;
+    std::vector<std::string> keys; // in the order of the class that declares them
     bool isAssociation = false;
-    bool isIndication = false;
-    bool isAbstract = false;
-    SourcePosition position;
 
-    // Null when there is none of that name.
+    // Returns null when there is none of that name.
     const PropertyDeclaration* property(std::string_view propertyName) const;
-    const MethodDeclaration* method(std::string_view methodName) const;
 
     // Whether the class is derived from the other one, at any distance; not from itself.
     bool isDerivedFrom(std::string_view ancestor) const;

@@ -2,170 +2,179 @@
 
 #include "host/repository/Compiler.h"
 
-#include "host/repository/MofError.h"
+#include "host/broker/Names.h"
+#include "host/repository/FileCompiler.h"
+#include "host/repository/Grammar.h"
 #include "host/repository/NamespaceName.h"
-#include "host/repository/Parser.h"
-#include "host/repository/QualifierRules.h"
 
-#include <algorithm>
+#include <cerrno>
+#include <fstream>
+#include <iterator>
 #include <stdexcept>
+#include <system_error>
 #include <utility>
 
 namespace Host {
 
 namespace {
 
-constexpr std::size_t maximumIncludeDepth = 16;
-constexpr std::size_t maximumIncludes = 4096;
-constexpr std::size_t maximumNamespaces = 256;
+namespace peg = tao::pegtl;
 
-// What would break the line of a message that shows the name.
-bool hasControlCharacter(std::string_view name)
+// What the actions work on: the file, what it declares, and what it may include.
+struct Unit {
+    Compiler& compiler;
+    Namespaces& namespaces;
+    const std::filesystem::path& file;
+    FileCompiler declarations;
+};
+
+Namespace& openNamespace(Namespaces& namespaces, std::string_view written)
 {
-    return std::any_of(name.begin(), name.end(),
-        [](char c) { return static_cast<unsigned char>(c) < 0x20 || c == 0x7F; });
+    const std::string name = plainNamespaceName(written);
+    for (const auto& known : namespaces)
+        if (equalNames(known->name(), name))
+            return *known;
+    return *namespaces.emplace_back(std::make_unique<Namespace>(name));
 }
 
-// One file is one file, by whatever path it is reached.
-std::filesystem::path identityOf(const std::filesystem::path& file)
-{
-    std::error_code failed;
-    std::filesystem::path identity = std::filesystem::weakly_canonical(file, failed);
-    return failed ? file.lexically_normal() : identity;
-}
+// Throws what the rule expected, at the place where it does not match.
+template <typename Rule>
+struct Control : peg::normal<Rule> {
+    template <typename Input>
+    [[noreturn]] static void raise(const Input& in, const Unit& /*unit*/)
+    {
+        throw peg::parse_error("expected " + std::string(Rule::expected), in);
+    }
+};
 
-std::string requireNamespaceName(std::string_view name)
-{
-    std::string plain = plainNamespaceName(name);
-    if (plain.empty())
-        throw std::invalid_argument(quotation(name) + " is no name of a namespace");
-    return plain;
-}
+template <Word DeclarationParts::*part>
+struct KeepWord {
+    template <typename Input>
+    static void apply(const Input& in, Unit& unit)
+    {
+        unit.declarations.parts.*part = {in.string(), in.position()};
+    }
+};
+
+template <std::vector<Word> DeclarationParts::*part>
+struct AppendWord {
+    template <typename Input>
+    static void apply(const Input& in, Unit& unit)
+    {
+        (unit.declarations.parts.*part).push_back({in.string(), in.position()});
+    }
+};
+
+template <Literal::Kind kind>
+struct AppendLiteral {
+    template <typename Input>
+    static void apply(const Input& in, Unit& unit)
+    {
+        unit.declarations.parts.value.elements.push_back({kind, in.string(), in.position()});
+    }
+};
+
+template <bool DeclarationParts::*part>
+struct SetFlag {
+    static void apply0(Unit& unit) { unit.declarations.parts.*part = true; }
+};
+
+template <void (FileCompiler::*function)()>
+struct Call {
+    static void apply0(Unit& unit) { (unit.declarations.*function)(); }
+};
+
+template <typename Rule>
+struct Action : peg::nothing<Rule> {
+};
+
+// clang-format off
+template <> struct Action<Grammar::PragmaName> : KeepWord<&DeclarationParts::pragmaName> {};
+template <> struct Action<Grammar::ClassName> : KeepWord<&DeclarationParts::className> {};
+template <> struct Action<Grammar::Superclass> : KeepWord<&DeclarationParts::superclass> {};
+template <> struct Action<Grammar::PropertyName> : KeepWord<&DeclarationParts::propertyName> {};
+template <> struct Action<Grammar::TypeName> : KeepWord<&DeclarationParts::typeName> {};
+template <> struct Action<Grammar::QualifierName> : KeepWord<&DeclarationParts::qualifierName> {};
+template <> struct Action<Grammar::ScopeName> : AppendWord<&DeclarationParts::scopes> {};
+template <> struct Action<Grammar::FlavorName> : AppendWord<&DeclarationParts::flavors> {};
+template <> struct Action<Grammar::Number> : AppendLiteral<Literal::Kind::number> {};
+template <> struct Action<Grammar::True> : AppendLiteral<Literal::Kind::truth> {};
+template <> struct Action<Grammar::False> : AppendLiteral<Literal::Kind::truth> {};
+template <> struct Action<Grammar::Null> : AppendLiteral<Literal::Kind::null> {};
+template <> struct Action<Grammar::Reference> : SetFlag<&DeclarationParts::isReference> {};
+template <> struct Action<Grammar::ArrayMark> : SetFlag<&DeclarationParts::isArray> {};
+template <> struct Action<Grammar::QualifierDeclaration> : Call<&FileCompiler::endQualifierDeclaration> {};
+template <> struct Action<Grammar::Qualifier> : Call<&FileCompiler::endQualifier> {};
+template <> struct Action<Grammar::ClassHead> : Call<&FileCompiler::beginClass> {};
+template <> struct Action<Grammar::Property> : Call<&FileCompiler::endProperty> {};
+template <> struct Action<Grammar::Class> : Call<&FileCompiler::endClass> {};
+// clang-format on
+
+template <>
+struct Action<Grammar::Piece> {
+    template <typename Input>
+    static void apply(const Input& in, Unit& unit)
+    {
+        unit.declarations.parts.text += in.string_view();
+    }
+};
+
+template <>
+struct Action<Grammar::Text> {
+    template <typename Input>
+    static void apply(const Input& in, Unit& unit)
+    {
+        DeclarationParts& parts = unit.declarations.parts;
+        parts.value.elements.push_back(
+            {Literal::Kind::text, std::exchange(parts.text, {}), in.position()});
+    }
+};
+
+template <>
+struct Action<Grammar::List> {
+    static void apply0(Unit& unit) { unit.declarations.parts.value.isList = true; }
+};
+
+template <>
+struct Action<Grammar::Pragma> {
+    static void apply0(Unit& unit)
+    {
+        DeclarationParts& parts = unit.declarations.parts;
+        const std::string argument = std::exchange(parts.value, {}).elements.front().text;
+        if (equalNames(parts.pragmaName.text, "namespace"))
+            unit.declarations.setNamespace(openNamespace(unit.namespaces, argument));
+        else
+            unit.compiler.compileFile(
+                unit.file.parent_path() / argument, unit.declarations.nameSpace().name());
+    }
+};
 
 } // namespace
 
-// One file on its way into the repository.
-class Compiler::Unit {
-public:
-    Unit(Compiler& compiler, const std::filesystem::path& file, Namespace& nameSpace)
-        : compiler_(compiler), file_(file), nameSpace_(&nameSpace)
-    {
-        compiler_.open_.push_back(identityOf(file));
-    }
-    ~Unit() { compiler_.open_.pop_back(); }
-    Unit(const Unit&) = delete;
-    Unit& operator=(const Unit&) = delete;
-
-    void compile(std::string_view text)
-    {
-        const auto name = std::make_shared<const std::string>(file_.string());
-        for (const Syntax::Production& production : parseMof(text, name))
-            std::visit([this](const auto& each) { add(each); }, production);
-    }
-
-private:
-    void add(const Syntax::Pragma& pragma)
-    {
-        if (equalNames(pragma.name.text, "include"))
-            include(pragma);
-        else if (equalNames(pragma.name.text, "namespace"))
-            changeNamespace(pragma);
-    }
-
-    void add(const Syntax::QualifierType& written)
-    {
-        if (const auto* const before = nameSpace_->findQualifier(written.name.text))
-            throw MofError(written.name.position, "qualifier " + written.name.text +
-                                                      " is declared already, at " +
-                                                      toText(before->position));
-        nameSpace_->add(declareQualifier(written));
-    }
-
-    void add(const Syntax::Class& written)
-    {
-        nameSpace_->add(
-            compileClass(written, *nameSpace_, compiler_.budget_, compiler_.referenced_));
-    }
-
-    void changeNamespace(const Syntax::Pragma& pragma)
-    {
-        const std::string name = plainNamespaceName(pragma.argument);
-        if (name.empty())
-            throw MofError(
-                pragma.argumentPosition, quotation(pragma.argument) + " is no name of a namespace");
-        nameSpace_ = &compiler_.openNamespace(name);
-        if (compiler_.namespaces_.size() > maximumNamespaces)
-            throw MofError(pragma.argumentPosition, "too many namespaces");
-    }
-
-    void include(const Syntax::Pragma& pragma)
-    {
-        if (hasControlCharacter(pragma.argument))
-            throw MofError(
-                pragma.argumentPosition, quotation(pragma.argument) + " is no name of a file");
-        const std::filesystem::path included = file_.parent_path() / pragma.argument;
-        const auto fail = [&](const std::string& reason) {
-            throw MofError(pragma.argumentPosition, included.string() + ": " + reason);
-        };
-        const auto& open = compiler_.open_;
-        if (std::find(open.begin(), open.end(), identityOf(included)) != open.end())
-            fail("includes itself");
-        if (open.size() > maximumIncludeDepth || ++compiler_.includes_ > maximumIncludes)
-            fail("too many files are included");
-        std::string text;
-        try {
-            text = compiler_.reader_(included);
-        } catch (const std::runtime_error& error) {
-            fail(error.what());
-        }
-        Unit(compiler_, included, *nameSpace_).compile(text);
-    }
-
-    Compiler& compiler_;
-    const std::filesystem::path& file_;
-    Namespace* nameSpace_;
-};
-
-Compiler::Compiler(SourceReader reader) : reader_(std::move(reader)) {}
-
 void Compiler::compileFile(const std::filesystem::path& file, std::string_view nameSpace)
 {
-    std::string text;
-    try {
-        text = reader_(file);
-    } catch (const std::runtime_error& error) {
-        throw std::runtime_error(file.string() + ": " + error.what());
-    }
+    std::ifstream stream(file, std::ios::binary);
+    if (!stream)
+        throw std::runtime_error(file.string() + ": " + std::generic_category().message(errno));
+    const std::string text((std::istreambuf_iterator<char>(stream)), {});
     compileText(text, file, nameSpace);
 }
 
 void Compiler::compileText(
     std::string_view text, const std::filesystem::path& file, std::string_view nameSpace)
 {
-    Unit(*this, file, openNamespace(requireNamespaceName(nameSpace))).compile(text);
+    peg::memory_input<> input(text.data(), text.size(), file.string());
+    Unit unit{
+        *this, namespaces_, file, {openNamespace(namespaces_, nameSpace), referencedClasses_}};
+    peg::parse<Grammar::File, Action, Control>(input, unit);
 }
 
 std::unique_ptr<const Repository> Compiler::finish() &&
 {
-    for (const ReferencedClass& reference : referenced_) {
-        const ClassDeclaration* const found = reference.nameSpace->findClass(reference.name);
-        if (found == nullptr)
-            throw MofError(reference.position, "class " + reference.name + " is not declared");
-        if (!reference.ancestor.empty() && !equalNames(reference.ancestor, found->name) &&
-            !found->isDerivedFrom(reference.ancestor))
-            throw MofError(reference.position,
-                "class " + found->name + " is not derived from class " + reference.ancestor +
-                    ", which the overridden reference names");
-    }
+    for (const ReferencedClass& each : referencedClasses_)
+        if (each.nameSpace->findClass(each.name) == nullptr)
+            throw std::runtime_error(each.place + ": " + each.name + " is no declared class");
     return std::make_unique<const Repository>(std::move(namespaces_));
-}
-
-Namespace& Compiler::openNamespace(std::string_view name)
-{
-    for (const auto& known : namespaces_)
-        if (equalNames(known->name(), name))
-            return *known;
-    return *namespaces_.emplace_back(std::make_unique<Namespace>(std::string(name)));
 }
 
 } // namespace Host

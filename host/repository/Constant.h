@@ -11,8 +11,8 @@
 
 namespace Host {
 
-// Null; boolean; sint; uint and char16; real; string, datetime and ref.
-using Scalar = std::variant<std::monostate, bool, std::int64_t, std::uint64_t, double, std::string>;
+// Null, boolean, signed integer, unsigned integer or string.
+using Scalar = std::variant<std::monostate, bool, std::int64_t, std::uint64_t, std::string>;
 
 // Fits the CIM type of the declaration it belongs to: a list exactly when that is an array,
 // or a null instead.

@@ -1,7 +1,7 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The grammar of MOF: pragmas, qualifier declarations and classes. No rule contains itself, so
-// that no text nests deeper than the rules do.
+// The part of the MOF grammar (DSP0004, annex A) that the files in schema/ use. A rule that must
+// match names in `expected` what an error message says was expected in its place.
 
 #pragma once
 
@@ -13,152 +13,86 @@ namespace peg = tao::pegtl;
 
 // clang-format off
 
-// Leaves the input where it was when it does not match: there the error is shown.
-template <typename... Rules>
-struct Whole : peg::sor<peg::seq<Rules...>, peg::failure> {};
-
-// Between tokens.
-struct CommentEnd : Whole<peg::until<peg::string<'*', '/'>>> {};
-struct BlockComment : peg::seq<peg::string<'/', '*'>, peg::must<CommentEnd>> {};
+// Tokens, each with the blanks and comments behind it.
 struct LineComment : peg::seq<peg::two<'/'>, peg::until<peg::eolf>> {};
-struct Blanks : peg::star<peg::sor<peg::one<' ', '\t', '\r', '\n', '\f', '\v'>, LineComment,
-    BlockComment>> {};
-
-template <typename... Rules>
-struct Token : peg::seq<Whole<Rules...>, Blanks> {};
+struct Blanks : peg::star<peg::sor<peg::space, LineComment>> {};
+template <typename Rule>
+struct Token : peg::seq<Rule, Blanks> { static constexpr const char* expected = Rule::expected; };
 template <char c>
-struct Mark : Token<peg::one<c>> {};
+struct Mark : peg::seq<peg::one<c>, Blanks> { static constexpr char expected[] = {c, '\0'}; };
 template <typename Text>
-struct Keyword : Token<Text, peg::not_at<peg::identifier_other>> {};
+struct Keyword : peg::seq<Text, peg::not_at<peg::identifier_other>, Blanks> {};
 template <typename Rule, typename End>
 struct CommaList : peg::seq<peg::must<Rule>, peg::star<Mark<','>, peg::must<Rule>>, peg::must<End>> {};
 
-// Texts and characters.
-struct HexadecimalCode : peg::seq<peg::one<'x', 'X'>, peg::xdigit, peg::rep_opt<3, peg::xdigit>> {};
-struct EscapeCode : Whole<peg::sor<peg::one<'b', 't', 'n', 'f', 'r', '"', '\'', '\\'>, HexadecimalCode>> {};
-struct Escape : peg::seq<peg::one<'\\'>, peg::must<EscapeCode>> {};
-struct ControlCharacter : peg::sor<peg::range<'\x00', '\x08'>, peg::range<'\x0a', '\x1f'>> {};
-template <char quote>
-struct PlainCharacter : peg::seq<peg::not_at<peg::sor<ControlCharacter, peg::one<quote>>>, peg::utf8::any> {};
-struct PieceText : peg::star<peg::sor<Escape, PlainCharacter<'"'>>> {};
-struct PieceEnd : peg::one<'"'> {};
-struct Piece : peg::seq<peg::one<'"'>, PieceText, peg::must<PieceEnd>> {};
-struct Text : peg::plus<Token<Piece>> {};
-struct OneCharacter : peg::sor<Escape, PlainCharacter<'\''>> {};
-struct CharacterEnd : peg::one<'\''> {};
-struct CharacterLiteral : Token<peg::one<'\''>, peg::must<OneCharacter>, peg::must<CharacterEnd>> {};
-
-// Numbers.
-struct Sign : peg::opt<peg::one<'+', '-'>> {};
-struct Exponent : peg::seq<peg::one<'e', 'E'>, Sign, peg::plus<peg::digit>> {};
-struct Real : peg::seq<Sign, peg::star<peg::digit>, peg::one<'.'>, peg::plus<peg::digit>, peg::opt<Exponent>> {};
-struct Hexadecimal : peg::seq<Sign, peg::one<'0'>, peg::one<'x', 'X'>, peg::plus<peg::xdigit>> {};
-struct Binary : peg::seq<Sign, peg::plus<peg::one<'0', '1'>>, peg::one<'b', 'B'>> {};
-struct Octal : peg::seq<Sign, peg::one<'0'>, peg::plus<peg::range<'0', '7'>>> {};
-struct Decimal : peg::seq<Sign, peg::sor<peg::one<'0'>, peg::seq<peg::range<'1', '9'>, peg::star<peg::digit>>>> {};
-struct NumberEnd : peg::not_at<peg::sor<peg::identifier_other, peg::one<'.'>>> {};
-struct Number : Token<peg::sor<Real, Hexadecimal, Binary, Octal, Decimal>, NumberEnd> {};
-struct NumberStart : peg::at<peg::one<'+', '-', '.', '0', '1', '2', '3', '4', '5', '6', '7', '8', '9'>> {};
-
 // Values.
-struct True : TAO_PEGTL_ISTRING("true") {};
-struct False : TAO_PEGTL_ISTRING("false") {};
-struct Null : TAO_PEGTL_ISTRING("null") {};
-struct Scalar : peg::sor<Text, CharacterLiteral, peg::seq<NumberStart, peg::must<Number>>,
-    Keyword<True>, Keyword<False>, Keyword<Null>> {};
-struct ListEnd : Mark<'}'> {};
-struct List : peg::seq<Mark<'{'>, peg::sor<Mark<'}'>, CommaList<Scalar, ListEnd>>> {};
-struct Value : peg::sor<List, Scalar> {};
-struct Default : peg::seq<Mark<'='>, peg::must<Value>> {};
+struct PlainCharacter : peg::seq<peg::not_at<peg::one<'"', '\\'>>, peg::utf8::range<0x20, 0x10FFFF>> {};
+struct Piece : peg::star<PlainCharacter> {};
+struct ClosingQuote : peg::one<'"'> { static constexpr auto expected = "the closing \" of the string"; };
+struct Text : peg::plus<peg::one<'"'>, Piece, peg::must<ClosingQuote>, Blanks> { static constexpr auto expected = "a string"; };
+struct Digits : peg::sor<peg::one<'0'>, peg::seq<peg::range<'1', '9'>, peg::star<peg::digit>>> {};
+struct Number : peg::seq<peg::opt<peg::one<'-'>>, Digits, peg::not_at<peg::identifier_other>> {};
+struct True : Keyword<TAO_PEGTL_ISTRING("true")> {};
+struct False : Keyword<TAO_PEGTL_ISTRING("false")> {};
+struct Null : Keyword<TAO_PEGTL_ISTRING("null")> {};
+struct Literal : peg::sor<Text, peg::seq<Number, Blanks>, True, False, Null> {
+    static constexpr auto expected = "a string, decimal number, true, false or null";
+};
+struct ListEnd : Mark<'}'> { static constexpr auto expected = ", or } in the list"; };
+struct List : peg::seq<Mark<'{'>, CommaList<Literal, ListEnd>> {};
+struct Default : peg::seq<Mark<'='>, peg::must<Literal>> {};
 
 // Types.
-struct DataType : peg::sor<
-    TAO_PEGTL_ISTRING("uint8"), TAO_PEGTL_ISTRING("uint16"), TAO_PEGTL_ISTRING("uint32"),
-    TAO_PEGTL_ISTRING("uint64"), TAO_PEGTL_ISTRING("sint8"), TAO_PEGTL_ISTRING("sint16"),
-    TAO_PEGTL_ISTRING("sint32"), TAO_PEGTL_ISTRING("sint64"), TAO_PEGTL_ISTRING("real32"),
-    TAO_PEGTL_ISTRING("real64"), TAO_PEGTL_ISTRING("boolean"), TAO_PEGTL_ISTRING("string"),
-    TAO_PEGTL_ISTRING("char16"), TAO_PEGTL_ISTRING("datetime")> {};
-struct QualifierDataType : Keyword<DataType> {};
-struct ReferenceClass : peg::identifier {};
-struct Type : Whole<peg::sor<Keyword<DataType>,
-    peg::seq<Token<ReferenceClass>, Keyword<TAO_PEGTL_ISTRING("ref")>>>> {};
-struct ArraySize : peg::plus<peg::digit> {};
-struct ArrayEnd : Mark<']'> {};
-struct Array : peg::seq<Mark<'['>, peg::opt<Token<ArraySize>>, peg::must<ArrayEnd>> {};
+struct TypeName : peg::identifier { static constexpr auto expected = "a data type or the name of a class"; };
+struct ArrayMark : peg::seq<Mark<'['>, peg::must<Mark<']'>>> {};
 
 // Qualifiers.
-struct FlavorWord : peg::sor<
-    TAO_PEGTL_ISTRING("enableoverride"), TAO_PEGTL_ISTRING("disableoverride"),
-    TAO_PEGTL_ISTRING("tosubclass"), TAO_PEGTL_ISTRING("restricted"),
-    TAO_PEGTL_ISTRING("translatable")> {};
-struct Flavor : Keyword<FlavorWord> {};
-struct ScopeWord : peg::sor<
-    TAO_PEGTL_ISTRING("schema"), TAO_PEGTL_ISTRING("class"), TAO_PEGTL_ISTRING("association"),
-    TAO_PEGTL_ISTRING("indication"), TAO_PEGTL_ISTRING("qualifier"),
-    TAO_PEGTL_ISTRING("property"), TAO_PEGTL_ISTRING("reference"), TAO_PEGTL_ISTRING("method"),
-    TAO_PEGTL_ISTRING("parameter"), TAO_PEGTL_ISTRING("any")> {};
-struct Scope : Keyword<ScopeWord> {};
-struct Open : Mark<'('> {};
-struct Close : Mark<')'> {};
-struct WordsEnd : Mark<')'> {};
-struct QualifierName : peg::identifier {};
-struct QualifierValue : peg::sor<peg::seq<Mark<'('>, peg::must<Scalar, Close>>, List> {};
-struct Qualifier : peg::seq<Token<QualifierName>, peg::opt<QualifierValue>,
-    peg::opt<Mark<':'>, peg::must<Flavor>, peg::star<Flavor>>> {};
-struct QualifiersEnd : Mark<']'> {};
+struct QualifierName : peg::identifier { static constexpr auto expected = "the name of a qualifier"; };
+struct QualifierValue : peg::sor<peg::seq<Mark<'('>, peg::must<Literal, Mark<')'>>>, List> {};
+struct Qualifier : peg::seq<peg::must<Token<QualifierName>>, peg::opt<QualifierValue>> {
+    static constexpr auto expected = QualifierName::expected;
+};
+struct QualifiersEnd : Mark<']'> { static constexpr auto expected = ", or ] after the qualifier"; };
 struct Qualifiers : peg::seq<Mark<'['>, CommaList<Qualifier, QualifiersEnd>> {};
 
 // Qualifier declarations.
-struct DeclaredName : Token<QualifierName> {};
-struct Colon : Mark<':'> {};
-struct ScopeComma : Mark<','> {};
-struct ScopeKeyword : Keyword<TAO_PEGTL_ISTRING("scope")> {};
-struct FlavorKeyword : Keyword<TAO_PEGTL_ISTRING("flavor")> {};
-struct Semicolon : Mark<';'> {};
+struct ScopeName : peg::identifier { static constexpr auto expected = "a scope"; };
+struct FlavorName : peg::identifier { static constexpr auto expected = "a flavor"; };
+struct WordsEnd : Mark<')'> { static constexpr auto expected = ", or )"; };
+struct ScopeKeyword : Keyword<TAO_PEGTL_ISTRING("scope")> { static constexpr auto expected = "Scope"; };
+struct FlavorKeyword : Keyword<TAO_PEGTL_ISTRING("flavor")> { static constexpr auto expected = "Flavor"; };
 struct QualifierDeclaration : peg::seq<Keyword<TAO_PEGTL_ISTRING("qualifier")>,
-    peg::must<DeclaredName, Colon, QualifierDataType>, peg::opt<Array>, peg::opt<Default>,
-    peg::must<ScopeComma, ScopeKeyword, Open>, CommaList<Scope, WordsEnd>,
-    peg::opt<Mark<','>, peg::must<FlavorKeyword, Open>, CommaList<Flavor, WordsEnd>>,
-    peg::must<Semicolon>> {};
+    peg::must<Token<QualifierName>, Mark<':'>, Token<TypeName>>, peg::opt<ArrayMark>, peg::opt<Default>,
+    peg::must<Mark<','>, ScopeKeyword, Mark<'('>>, CommaList<Token<ScopeName>, WordsEnd>,
+    peg::must<Mark<','>, FlavorKeyword, Mark<'('>>, CommaList<Token<FlavorName>, WordsEnd>,
+    peg::must<Mark<';'>>> {};
 
 // Classes.
-struct ParameterName : peg::identifier {};
-struct NamedParameter : Token<ParameterName> {};
-struct Parameter : peg::seq<peg::opt<Qualifiers>, peg::must<Type, NamedParameter>, peg::opt<Array>> {};
-struct ParametersEnd : Mark<')'> {};
-struct Parameters : peg::seq<Mark<'('>, peg::sor<Mark<')'>, CommaList<Parameter, ParametersEnd>>> {};
-struct FeatureName : peg::identifier {};
-struct NamedFeature : Token<FeatureName> {};
-struct NoFeature : peg::failure {};
-struct FeatureType : peg::sor<peg::seq<Qualifiers, peg::must<Type>>, Type, peg::must<NoFeature>> {};
-struct FeatureEnd : Mark<';'> {};
-struct Feature : peg::seq<FeatureType, peg::must<NamedFeature>,
-    peg::sor<Parameters, peg::seq<peg::opt<Array>, peg::opt<Default>>>, peg::must<FeatureEnd>> {};
-struct ClassName : peg::identifier {};
-struct NamedClass : Token<ClassName> {};
-struct AliasName : Token<peg::one<'$'>, peg::identifier> {};
-struct Superclass : peg::identifier {};
-struct NamedSuperclass : Token<Superclass> {};
-struct ClassOpen : Mark<'{'> {};
-struct ClassKeyword : Keyword<TAO_PEGTL_ISTRING("class")> {};
-struct Instances : peg::failure {};
-struct Instance : peg::seq<peg::at<Keyword<TAO_PEGTL_ISTRING("instance")>>, peg::must<Instances>> {};
-struct ClassHead : peg::sor<ClassKeyword,
-    peg::seq<Qualifiers, peg::opt<Instance>, peg::must<ClassKeyword>>> {};
-struct Class : peg::seq<ClassHead, peg::must<NamedClass>,
-    peg::opt<Keyword<TAO_PEGTL_ISTRING("as")>, peg::must<AliasName>>,
-    peg::opt<Mark<':'>, peg::must<NamedSuperclass>>, peg::must<ClassOpen>,
-    peg::until<Mark<'}'>, Feature>, peg::must<Semicolon>> {};
+struct Reference : Keyword<TAO_PEGTL_ISTRING("ref")> {};
+struct PropertyName : peg::identifier { static constexpr auto expected = "the name of the property"; };
+struct PropertyType : Token<TypeName> { static constexpr auto expected = "a property or }"; };
+struct PropertyEnd : Mark<';'> { static constexpr auto expected = "; after the property"; };
+struct NamedProperty : peg::must<Token<PropertyName>> {};
+struct Property : peg::seq<peg::opt<Qualifiers>, peg::must<PropertyType>,
+    peg::sor<peg::seq<Reference, NamedProperty>, peg::seq<NamedProperty, peg::opt<ArrayMark>, peg::opt<Default>>>,
+    peg::must<PropertyEnd>> {};
+struct ClassName : peg::identifier { static constexpr auto expected = "the name of a class"; };
+struct Superclass : peg::identifier { static constexpr auto expected = "the name of the superclass"; };
+struct ClassKeyword : Keyword<TAO_PEGTL_ISTRING("class")> { static constexpr auto expected = "class after the qualifiers"; };
+struct ClassHead : peg::seq<peg::sor<ClassKeyword, peg::seq<Qualifiers, peg::must<ClassKeyword>>>,
+    peg::must<Token<ClassName>>, peg::opt<Mark<':'>, peg::must<Token<Superclass>>>, peg::must<Mark<'{'>>> {};
+struct Class : peg::seq<ClassHead, peg::until<Mark<'}'>, Property>, peg::must<Mark<';'>>> {};
 
 // Files.
-struct PragmaName : peg::identifier {};
-struct NamedPragma : Token<PragmaName> {};
-struct PragmaText : Text {};
-struct PragmaWord : peg::seq<peg::one<'#'>, peg::star<peg::blank>, TAO_PEGTL_ISTRING("pragma")> {};
-struct Pragma : peg::seq<Keyword<PragmaWord>, peg::must<NamedPragma, Open, PragmaText, Close>> {};
-struct Production : peg::sor<Pragma, QualifierDeclaration, Class, Instance> {};
-struct File : peg::seq<peg::opt<peg::utf8::bom>, Blanks,
-    peg::until<peg::eof, peg::must<Production>>> {};
+struct PragmaName : peg::sor<TAO_PEGTL_ISTRING("include"), TAO_PEGTL_ISTRING("namespace")> {
+    static constexpr auto expected = "include or namespace";
+};
+struct Pragma : peg::seq<Keyword<TAO_PEGTL_ISTRING("#pragma")>,
+    peg::must<Token<PragmaName>, Mark<'('>, Text, Mark<')'>>> {};
+struct Declaration : peg::sor<Pragma, QualifierDeclaration, Class> {
+    static constexpr auto expected = "#pragma, a qualifier declaration or a class";
+};
+struct File : peg::seq<Blanks, peg::until<peg::eof, peg::must<Declaration>>> {};
 
 // clang-format on
 

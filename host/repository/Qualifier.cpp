@@ -12,8 +12,7 @@ template <typename T>
 const T* valueOf(const QualifierList& qualifiers, std::string_view name)
 {
     const Qualifier* const found = findQualifier(qualifiers, name);
-    const Scalar* const value =
-        found == nullptr ? nullptr : std::get_if<Scalar>(found->value.get());
+    const Scalar* const value = found == nullptr ? nullptr : std::get_if<Scalar>(&found->value);
     return value == nullptr ? nullptr : std::get_if<T>(value);
 }
 

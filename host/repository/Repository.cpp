@@ -11,7 +11,6 @@ namespace Host {
 
 namespace {
 
-// No class has more than a bounded number of ancestors, and so has the recursion.
 void appendSubclasses(const std::vector<const ClassDeclaration*>& classes, Repository::Depth depth,
     std::vector<const ClassDeclaration*>& found)
 {
@@ -90,7 +89,7 @@ const std::vector<std::string>* Repository::keysOf(
     std::string_view nameSpace, std::string_view className) const
 {
     const ClassDeclaration* const declared = findClass(nameSpace, className);
-    return declared == nullptr ? nullptr : declared->keys.get();
+    return declared == nullptr ? nullptr : &declared->keys;
 }
 
 bool Repository::isDerivedFrom(

@@ -330,12 +330,12 @@ TEST_F(AnswerTest, takesFromTheClassWhatAValueDoesNotSay)
     made.setProperty("Percent", Value::null(CMPI_uint8));
     Host::CimXml::PropertySelection selection;
     EXPECT_EQ(instanceXml(made, &declared),
-        R"(<INSTANCE CLASSNAME="Gauge"><PROPERTY.ARRAY NAME="Levels" TYPE="sint32" ARRAYSIZE="3">)"
+        R"(<INSTANCE CLASSNAME="Gauge"><PROPERTY.ARRAY NAME="Levels" TYPE="sint32">)"
         R"(</PROPERTY.ARRAY><PROPERTY NAME="Percent" TYPE="uint8"></PROPERTY></INSTANCE>)");
     selection.includeClassOrigin = true;
     selection.properties = {"LEVELS"};
     EXPECT_EQ(instanceXml(made, &declared, selection),
-        R"(<INSTANCE CLASSNAME="Gauge"><PROPERTY.ARRAY NAME="Levels" TYPE="sint32" ARRAYSIZE="3" )"
+        R"(<INSTANCE CLASSNAME="Gauge"><PROPERTY.ARRAY NAME="Levels" TYPE="sint32" )"
         R"(CLASSORIGIN="Thing" PROPAGATED="true"></PROPERTY.ARRAY></INSTANCE>)");
 }
 

@@ -30,10 +30,9 @@ class Thing {
     [Key] uint16 Index;
     string Label = "none";
     boolean IsOn;
-    sint32 Levels[3];
+    sint32 Levels[];
     datetime Since;
     real64 Reading;
-    uint32 Reset([In] boolean Hard, [In] Thing ref Others[]);
 };
 class Gauge : Thing {
     uint8 Percent;

@@ -42,8 +42,6 @@ TEST_F(SelectionTest, localIsWhatTheClassDeclares)
     EXPECT_FALSE(isSelected(selection, &gauge, "Name"));
     EXPECT_TRUE(isSelected(selection, &gauge, "Unknown"));
     EXPECT_TRUE(isSelected(selection, nullptr, "Name"));
-    EXPECT_FALSE(isSelected(selection, gauge, *gauge.method("Reset")));
-    EXPECT_TRUE(isSelected(selection, *gauge.superclass, *gauge.method("Reset")));
 }
 
 TEST_F(SelectionTest, qualifiersAreSelectedOnRequest)

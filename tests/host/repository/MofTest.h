@@ -5,7 +5,6 @@
 #pragma once
 
 #include "host/repository/Compiler.h"
-#include "host/repository/MofError.h"
 
 #include <gtest/gtest.h>
 
@@ -21,13 +20,11 @@ inline constexpr const char* NameSpace = "root/test";
 inline constexpr std::string_view CommonQualifiers = R"(
 Qualifier Abstract : boolean = false, Scope(class, association, indication), Flavor(Restricted);
 Qualifier Association : boolean = false, Scope(association), Flavor(DisableOverride);
-Qualifier Indication : boolean = false, Scope(class, indication), Flavor(DisableOverride);
 Qualifier Key : boolean = false, Scope(property, reference), Flavor(DisableOverride, ToSubclass);
 Qualifier Override : string = null, Scope(property, reference, method), Flavor(Restricted);
 Qualifier Description : string = null, Scope(any), Flavor(EnableOverride, ToSubclass, Translatable);
-Qualifier MaxLen : uint32 = null, Scope(property, method, parameter);
-Qualifier Values : string[], Scope(property, method, parameter);
-Qualifier In : boolean = true, Scope(parameter), Flavor(DisableOverride);
+Qualifier MaxLen : uint32 = null, Scope(property, method, parameter), Flavor(ToSubclass);
+Qualifier Values : string[], Scope(property, method, parameter), Flavor(ToSubclass);
 Qualifier Version : string = null, Scope(class, association, indication), Flavor(Restricted);
 )";
 
@@ -52,7 +49,7 @@ inline std::string errorOf(std::string_view text)
     try {
         compile(text);
         return "no error";
-    } catch (const Host::MofError& error) {
+    } catch (const std::runtime_error& error) {
         return error.what();
     }
 }
@@ -79,7 +76,7 @@ inline const Host::PropertyDeclaration& propertyNamed(
 inline Host::Constant defaultOf(const std::string& typeAndName, const std::string& value)
 {
     const auto repository = compile("class A { " + typeAndName + " = " + value + "; };");
-    return *propertyNamed(*repository, "A", "P").defaultValue;
+    return propertyNamed(*repository, "A", "P").defaultValue;
 }
 
 template <typename Value>

@@ -9,7 +9,7 @@
 #include "host/broker/String.h"
 #include "host/manager/Manager.h"
 #include "host/manager/SensorProfile.h"
-#include "host/repository/Words.h"
+#include "host/repository/TypeNames.h"
 #include "tests/support/Environment.h"
 #include "tests/support/ShippedClasses.h"
 

@@ -164,8 +164,8 @@ TEST_F(ShippedSchemaTest, everyMappedValueHasItsText)
                     continue;
                 ++maps;
                 ASSERT_NE(map, nullptr) << declared->name << "." << property->name;
-                EXPECT_EQ(std::get<std::vector<Host::Scalar>>(*map->value).size(),
-                    std::get<std::vector<Host::Scalar>>(*texts->value).size())
+                EXPECT_EQ(std::get<std::vector<Host::Scalar>>(map->value).size(),
+                    std::get<std::vector<Host::Scalar>>(texts->value).size())
                     << declared->name << "." << property->name;
             }
     EXPECT_GT(maps, 0);
@@ -180,7 +180,7 @@ TEST_F(ShippedSchemaTest, mappedPropertiesExist)
                     Host::findQualifier(property->qualifiers, "ModelCorrespondence");
                 if (others == nullptr)
                     continue;
-                for (const auto& other : std::get<std::vector<Host::Scalar>>(*others->value)) {
+                for (const auto& other : std::get<std::vector<Host::Scalar>>(others->value)) {
                     const std::string& text = std::get<std::string>(other);
                     const auto dot = text.find('.');
                     const auto* const owner = nameSpace->findClass(text.substr(0, dot));

@@ -1,31 +1,12 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-#include "host/repository/MofError.h"
+#include "host/cimxml/Quotation.h"
 
-#include <utility>
-
-namespace Host {
-
-namespace {
-
-constexpr std::size_t maximumQuote = 40;
-
-} // namespace
-
-MofError::MofError(SourcePosition position, const std::string& reason)
-    : std::runtime_error(toText(position) + ": " + reason), position_(std::move(position)),
-      reason_(std::make_shared<const std::string>(reason))
-{
-}
-
-std::string toText(const SourcePosition& position)
-{
-    return (position.file ? *position.file : std::string()) + ":" + std::to_string(position.line) +
-           ":" + std::to_string(position.column);
-}
+namespace Host::CimXml {
 
 std::string quotation(std::string_view text)
 {
+    constexpr std::size_t maximumQuote = 40;
     constexpr std::string_view digits = "0123456789abcdef";
     std::string quote = "\"";
     for (const char c : text.substr(0, maximumQuote)) {
@@ -41,4 +22,4 @@ std::string quotation(std::string_view text)
     return quote + (text.size() > maximumQuote ? "...\"" : "\"");
 }
 
-} // namespace Host
+} // namespace Host::CimXml
