@@ -3,42 +3,27 @@
 #include "host/http/BasicCredentials.h"
 
 #include "host/broker/Names.h"
-#include "host/http/RequestHead.h"
+#include "platform/text/Trim.h"
 
-#include <cstddef>
-#include <cstdint>
+#include <gnutls/gnutls.h>
+
+#include <memory>
 
 namespace Host::Http {
 
 namespace {
 
-constexpr std::string_view alphabet =
-    "ABCDEFGHIJKLMNOPQRSTUVWXYZabcdefghijklmnopqrstuvwxyz0123456789+/";
-
 std::optional<std::string> fromBase64(std::string_view text)
 {
-    if (text.size() % 4 != 0)
+    std::string encoded(text);
+    const ::gnutls_datum_t source{
+        reinterpret_cast<unsigned char*>(encoded.data()), static_cast<unsigned>(encoded.size())};
+    ::gnutls_datum_t decoded{};
+    if (::gnutls_base64_decode2(&source, &decoded) != 0)
         return std::nullopt;
-    std::size_t padding = 0;
-    while (padding < 2 && text.ends_with('=')) {
-        text.remove_suffix(1);
-        ++padding;
-    }
-    std::string bytes;
-    std::uint32_t bits = 0;
-    unsigned count = 0;
-    for (const char c : text) {
-        const std::size_t value = alphabet.find(c);
-        if (value == std::string_view::npos)
-            return std::nullopt;
-        bits = (bits << 6 | static_cast<std::uint32_t>(value)) & 0xFFFFU;
-        count += 6;
-        if (count >= 8) {
-            count -= 8;
-            bytes += static_cast<char>(bits >> count & 0xFFU);
-        }
-    }
-    return bytes;
+    const std::unique_ptr<unsigned char, decltype(::gnutls_free)> owner(
+        decoded.data, ::gnutls_free);
+    return std::string(reinterpret_cast<const char*>(decoded.data), decoded.size);
 }
 
 } // namespace
@@ -49,7 +34,7 @@ std::optional<Credentials> basicCredentials(std::string_view authorization)
     if (schemeEnd == std::string_view::npos ||
         !equalNames(authorization.substr(0, schemeEnd), "Basic"))
         return std::nullopt;
-    const auto text = fromBase64(withoutBlanks(authorization.substr(schemeEnd)));
+    const auto text = fromBase64(Text::trimmed(authorization.substr(schemeEnd), " \t"));
     if (!text || text->find('\0') != std::string::npos)
         return std::nullopt;
     const std::size_t colon = text->find(':');

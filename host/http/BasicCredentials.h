@@ -13,7 +13,8 @@ struct Credentials {
     std::string password;
 };
 
-// What the header field Authorization says; nothing when it is of another scheme or malformed.
+// Returns the credentials in the value of an Authorization field (RFC 7617); nothing for another
+// scheme and for a malformed value.
 std::optional<Credentials> basicCredentials(std::string_view authorization);
 
 } // namespace Host::Http

@@ -22,13 +22,13 @@ namespace {
 
 HttpError unauthorized()
 {
-    return {Status::unauthorized, "sign in with a name and a password", {},
+    return {MHD_HTTP_UNAUTHORIZED, "sign in with a name and a password", {},
         {{"WWW-Authenticate", R"(Basic realm="sensor-profile", charset="UTF-8")"}}};
 }
 
 HttpError unavailable(const std::string& reason)
 {
-    return {Status::unavailable, reason, {}, {{"Retry-After", "1"}}};
+    return {MHD_HTTP_SERVICE_UNAVAILABLE, reason, {}, {{"Retry-After", "1"}}};
 }
 
 WorkSlots::Slot takeSlot(WorkSlots& slots)
@@ -46,7 +46,7 @@ bool Exchange::begin(const RequestHead& head, std::size_t headSize)
     try {
         bodySize_ = bodySizeOf(head);
         if (headSize > service_.limits.maximumHeader)
-            throw HttpError(Status::headerTooLarge,
+            throw HttpError(MHD_HTTP_REQUEST_HEADER_FIELDS_TOO_LARGE,
                 "a head holds at most " + std::to_string(service_.limits.maximumHeader) + " bytes");
         head_ = checkHead(head, bodySize_, service_.limits);
         caller_.address = client_.address;
@@ -132,7 +132,7 @@ bool Exchange::receive(std::string_view piece)
         return true;
     }
     discarded_ = body_.size() + piece.size();
-    error_.emplace(Status::contentTooLarge,
+    error_.emplace(MHD_HTTP_CONTENT_TOO_LARGE,
         "a body holds at most " + std::to_string(service_.limits.maximumBody) + " bytes");
     body_ = {};
     state_ = State::discarding;
@@ -153,7 +153,7 @@ bool Exchange::execute()
         throw;
     } catch (const std::exception& error) {
         report({"execute", "Exchange", __LINE__}, std::string("a request failed: ") + error.what());
-        error_ = HttpError(Status::internalError, "the request failed; the log tells why");
+        error_ = HttpError(MHD_HTTP_INTERNAL_SERVER_ERROR, "the request failed; the log tells why");
     }
     return sendError();
 }
@@ -191,7 +191,7 @@ bool Exchange::sendAnswer()
         response.add(field);
     if (service_.connections.isShuttingDown())
         response.endConnection();
-    return send(response, Status::ok);
+    return send(response, MHD_HTTP_OK);
 }
 
 bool Exchange::sendError()

@@ -4,8 +4,8 @@
 
 #include "host/broker/Names.h"
 #include "host/cimxml/Message.h"
-#include "host/http/MandatoryExtension.h"
-#include "host/http/MediaType.h"
+
+#include <microhttpd.h>
 
 #include <algorithm>
 #include <charconv>
@@ -16,35 +16,48 @@ namespace Host::Http {
 
 namespace {
 
-constexpr std::string_view mismatch = "header-mismatch";
+constexpr std::string_view mismatch = "header-mismatch"; // a CIMError of DSP0200
+
+// The extension that an M-POST declares, as DSP0200 names it.
+constexpr std::string_view mappingExtension = "http://www.dmtf.org/cim/mapping/http/v1.0";
+
+// Returns whether the text is a token as RFC 9110, 5.6.2 defines it.
+bool isToken(std::string_view text)
+{
+    constexpr std::string_view punctuation = "!#$%&'*+-.^_`|~";
+    return !text.empty() && std::all_of(text.begin(), text.end(), [&](char c) {
+        return (c >= '0' && c <= '9') || (foldCase(c) >= 'a' && foldCase(c) <= 'z') ||
+               punctuation.find(c) != std::string_view::npos;
+    });
+}
 
 bool isControl(char c)
 {
     return (c >= '\0' && c < ' ' && c != '\t') || c == '\x7F';
 }
 
-// What others may read otherwise: a name with a blank as the same without, a carriage return in
-// a value as its end. A zero is seen here only where no HTTP library was before: to it that is the
-// end of the value, and it hands on no more.
+// Refuses what a proxy may parse differently: white space in a name (RFC 9112, 5.1) and control
+// characters in a value (RFC 9110, 5.5). libmicrohttpd ends values at a zero.
 void checkFields(const RequestHead& head)
 {
     for (const HeaderField& field : head.fields) {
         if (!isToken(field.name))
             throw HttpError::closing(
-                Status::badRequest, "the name of a header field holds a character it must not");
+                MHD_HTTP_BAD_REQUEST, "the name of a header field holds a character it must not");
         if (std::any_of(field.value.begin(), field.value.end(), isControl))
-            throw HttpError::closing(Status::badRequest,
+            throw HttpError::closing(MHD_HTTP_BAD_REQUEST,
                 "the header field " + field.name + " holds a control character");
     }
 }
 
+// RFC 9112, 3.2.
 void checkHost(const RequestHead& head)
 {
     if (!head.find("Host") && head.version != "HTTP/1.0")
-        throw HttpError::closing(Status::badRequest, "the header field Host is missing");
+        throw HttpError::closing(MHD_HTTP_BAD_REQUEST, "the header field Host is missing");
 }
 
-// What two hexadecimal digits say.
+// Returns the value of two hexadecimal digits.
 std::optional<char> octet(std::string_view digits)
 {
     unsigned value = 0;
@@ -55,7 +68,7 @@ std::optional<char> octet(std::string_view digits)
     return static_cast<char>(value);
 }
 
-// With the octets that stand behind percent signs; nothing where one has no two digits.
+// Decodes percent signs (RFC 3986, 2.1). Returns nothing where one is not followed by two digits.
 std::optional<std::string> decoded(std::string_view text)
 {
     std::string result;
@@ -64,16 +77,16 @@ std::optional<std::string> decoded(std::string_view text)
             result += text[i];
             continue;
         }
-        const auto hidden = octet(text.substr(i + 1, 2));
-        if (!hidden)
+        const auto encoded = octet(text.substr(i + 1, 2));
+        if (!encoded)
             return std::nullopt;
-        result += *hidden;
+        result += *encoded;
         i += 2;
     }
     return result;
 }
 
-// Without query, and without scheme and host where the target names them, as it does for proxies.
+// Returns the path of a target in origin form or in absolute form (RFC 9112, 3.2).
 std::string_view pathIn(std::string_view target)
 {
     const std::size_t schemeEnd = target.find("://");
@@ -94,38 +107,68 @@ std::string_view pathIn(std::string_view target)
 void checkTargetAndMethod(const RequestHead& head)
 {
     const bool isPost = head.method == "POST" || head.method == "M-POST";
-    const bool isForTheWholeServer = head.target == "*" && !isPost;
+    const bool isAsterisk = head.target == "*" && !isPost;
     const auto path = decoded(pathIn(head.target));
-    if (!isForTheWholeServer && path != "/cimom" && path != "/")
-        throw HttpError(Status::notFound, "requests go to /cimom");
+    if (!isAsterisk && path != "/cimom" && path != "/")
+        throw HttpError(MHD_HTTP_NOT_FOUND, "requests go to /cimom");
     if (!isPost)
-        throw HttpError(Status::methodNotAllowed, "requests are made by POST or M-POST", {},
+        throw HttpError(MHD_HTTP_METHOD_NOT_ALLOWED, "requests are made by POST or M-POST", {},
             {{"Allow", "POST, M-POST"}});
 }
 
+// Returns the two digits that stand before the field names of an M-POST (RFC 2774, 5).
+std::string extensionPrefixOf(const RequestHead& head)
+{
+    const auto declared = head.find("Man");
+    if (!declared)
+        throw HttpError(MHD_HTTP_BAD_REQUEST, "an M-POST must have the header field Man");
+    const auto [extension, parameters] = parseParameters(*declared);
+    if (withoutQuotes(extension) != mappingExtension)
+        throw HttpError(MHD_HTTP_NOT_EXTENDED,
+            "the only mandatory extension is " + std::string(mappingExtension));
+    const bool isNamespace = parameters.size() == 1 && equalNames(parameters[0].name, "ns");
+    const std::string_view prefix = isNamespace ? parameters[0].value : "";
+    if (prefix.size() != 2 || prefix.find_first_not_of("0123456789") != std::string_view::npos)
+        throw HttpError(
+            MHD_HTTP_BAD_REQUEST, "the header field Man must end with ;ns= and two digits");
+    return std::string(prefix);
+}
+
+bool isXmlInUtf8(std::string_view contentType)
+{
+    const auto [type, parameters] = parseParameters(contentType);
+    return (equalNames(type, "application/xml") || equalNames(type, "text/xml")) &&
+           std::none_of(parameters.begin(), parameters.end(), [](const auto& parameter) {
+               return equalNames(parameter.name, "charset") &&
+                      !equalNames(withoutQuotes(parameter.value), "utf-8");
+           });
+}
+
+// DSP0200 allows no other encoding.
 void checkContent(const RequestHead& head)
 {
     const auto type = head.find("Content-Type");
     if (!type || !isXmlInUtf8(*type))
-        throw HttpError(Status::unsupportedMediaType,
+        throw HttpError(MHD_HTTP_UNSUPPORTED_MEDIA_TYPE,
             "the Content-Type must be application/xml or text/xml, in utf-8");
     const auto coding = head.find("Content-Encoding");
     if (coding && !equalNames(*coding, "identity"))
-        throw HttpError(Status::unsupportedMediaType, "the body must not be compressed");
+        throw HttpError(MHD_HTTP_UNSUPPORTED_MEDIA_TYPE, "the body must not be compressed");
 }
 
 void checkOperation(const RequestHead& head, const std::string& prefix)
 {
     const auto operation = head.find(prefix + "CIMOperation");
     if (!operation || !equalNames(*operation, "MethodCall"))
-        throw HttpError(Status::badRequest, "the header field CIMOperation must be MethodCall",
+        throw HttpError(MHD_HTTP_BAD_REQUEST, "the header field CIMOperation must be MethodCall",
             "unsupported-operation");
     const auto version = head.find(prefix + "CIMProtocolVersion");
     if (version && !version->starts_with("1."))
-        throw HttpError(Status::notImplemented, "the CIMProtocolVersion must be 1.x",
+        throw HttpError(MHD_HTTP_NOT_IMPLEMENTED, "the CIMProtocolVersion must be 1.x",
             "unsupported-protocol-version");
 }
 
+// DSP0200 has clients encode what a field must not contain.
 std::optional<std::string> findDecoded(const RequestHead& head, const std::string& name)
 {
     const auto value = head.find(name);
@@ -133,12 +176,12 @@ std::optional<std::string> findDecoded(const RequestHead& head, const std::strin
         return std::nullopt;
     auto text = decoded(*value);
     if (!text)
-        throw HttpError(Status::badRequest,
+        throw HttpError(MHD_HTTP_BAD_REQUEST,
             "the header field " + name + " holds a percent sign without two digits", mismatch);
     return text;
 }
 
-// Of a path with or without host, class and keys.
+// Returns the namespace of an object path with or without host, class and keys.
 std::string_view nameSpaceIn(std::string_view object)
 {
     if (object.starts_with("//")) {
@@ -155,6 +198,7 @@ std::string_view nameSpaceIn(std::string_view object)
 
 } // namespace
 
+// RFC 9112, 6.3: a message whose length others may compute differently is refused.
 BodySize bodySizeOf(const RequestHead& head)
 {
     checkFields(head);
@@ -162,19 +206,19 @@ BodySize bodySizeOf(const RequestHead& head)
     if (const auto expectation = head.find("Expect")) {
         if (!equalNames(*expectation, "100-continue"))
             throw HttpError::closing(
-                Status::expectationFailed, "the only expectation met is 100-continue");
+                MHD_HTTP_EXPECTATION_FAILED, "the only expectation met is 100-continue");
         body.isAwaited = true;
     }
     const auto length = head.find("Content-Length");
     if (const auto coding = head.find("Transfer-Encoding")) {
         if (!equalNames(*coding, "chunked"))
             throw HttpError::closing(
-                Status::notImplemented, "the only Transfer-Encoding is chunked");
+                MHD_HTTP_NOT_IMPLEMENTED, "the only Transfer-Encoding is chunked");
         if (length)
             throw HttpError::closing(
-                Status::badRequest, "both Content-Length and Transfer-Encoding are there");
+                MHD_HTTP_BAD_REQUEST, "both Content-Length and Transfer-Encoding are there");
         if (head.version == "HTTP/1.0")
-            throw HttpError::closing(Status::badRequest, "HTTP/1.0 knows no Transfer-Encoding");
+            throw HttpError::closing(MHD_HTTP_BAD_REQUEST, "HTTP/1.0 knows no Transfer-Encoding");
         return body;
     }
     body.bytes = 0;
@@ -183,9 +227,9 @@ BodySize bodySizeOf(const RequestHead& head)
     const char* const end = length->data() + length->size();
     const auto [stop, error] = std::from_chars(length->data(), end, *body.bytes);
     if (error == std::errc::result_out_of_range)
-        throw HttpError::closing(Status::contentTooLarge, "the body is far too large");
+        throw HttpError::closing(MHD_HTTP_CONTENT_TOO_LARGE, "the body is far too large");
     if (error != std::errc{} || stop != end)
-        throw HttpError::closing(Status::badRequest, "the Content-Length is no number");
+        throw HttpError::closing(MHD_HTTP_BAD_REQUEST, "the Content-Length is no number");
     return body;
 }
 
@@ -195,14 +239,14 @@ CallHead checkHead(const RequestHead& head, const BodySize& body, const Limits& 
     checkTargetAndMethod(head);
     CallHead call;
     if (head.method == "M-POST")
-        call.extension = mandatoryExtensionOf(head);
+        call.extension = extensionPrefixOf(head);
     const std::string prefix = call.extension ? *call.extension + "-" : "";
     checkContent(head);
     if (body.bytes && !head.find("Content-Length"))
-        throw HttpError::closing(Status::lengthRequired,
+        throw HttpError::closing(MHD_HTTP_LENGTH_REQUIRED,
             "neither Content-Length nor Transfer-Encoding says where the body ends");
     if (body.bytes && *body.bytes > limits.maximumBody)
-        throw HttpError(Status::contentTooLarge,
+        throw HttpError(MHD_HTTP_CONTENT_TOO_LARGE,
             "a body holds at most " + std::to_string(limits.maximumBody) + " bytes");
     checkOperation(head, prefix);
     call.method = findDecoded(head, prefix + "CIMMethod");
@@ -214,7 +258,7 @@ CallHead checkHead(const RequestHead& head, const BodySize& body, const Limits& 
 void requireMatch(const CallHead& head, const CimXml::Message& message)
 {
     const auto refuse = [](const std::string& reason) {
-        throw HttpError(Status::badRequest, reason, mismatch);
+        throw HttpError(MHD_HTTP_BAD_REQUEST, reason, mismatch);
     };
     if (!head.method)
         refuse("the header field CIMMethod is missing");
@@ -233,7 +277,7 @@ std::vector<HeaderField> answerFieldsFor(const CallHead& head)
         fields.push_back({"CIMOperation", "MethodResponse"});
         return fields;
     }
-    fields.push_back({"Man", std::string(mandatoryExtension) + ";ns=" + *head.extension});
+    fields.push_back({"Man", std::string(mappingExtension) + ";ns=" + *head.extension});
     fields.push_back({"Ext", ""});
     fields.push_back({"Cache-Control", "no-cache"});
     fields.push_back({*head.extension + "-CIMOperation", "MethodResponse"});

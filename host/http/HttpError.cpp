@@ -4,6 +4,8 @@
 
 #include "host/cimxml/RequestError.h"
 
+#include <microhttpd.h>
+
 #include <utility>
 
 namespace Host::Http {
@@ -19,9 +21,9 @@ unsigned statusOf(Outcome outcome)
     case Outcome::unsupportedDtdVersion:
     case Outcome::unsupportedProtocolVersion:
     case Outcome::multipleRequestsUnsupported:
-        return Status::notImplemented;
+        return MHD_HTTP_NOT_IMPLEMENTED;
     default:
-        return Status::badRequest;
+        return MHD_HTTP_BAD_REQUEST;
     }
 }
 

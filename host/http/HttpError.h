@@ -1,7 +1,5 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Why a request is not carried out, as HTTP tells it.
-
 #pragma once
 
 #include <stdexcept>
@@ -15,43 +13,24 @@ class RequestError;
 
 namespace Host::Http {
 
-namespace Status {
-
-inline constexpr unsigned ok = 200;
-inline constexpr unsigned badRequest = 400;
-inline constexpr unsigned unauthorized = 401;
-inline constexpr unsigned notFound = 404;
-inline constexpr unsigned methodNotAllowed = 405;
-inline constexpr unsigned lengthRequired = 411;
-inline constexpr unsigned contentTooLarge = 413;
-inline constexpr unsigned unsupportedMediaType = 415;
-inline constexpr unsigned expectationFailed = 417;
-inline constexpr unsigned headerTooLarge = 431;
-inline constexpr unsigned internalError = 500;
-inline constexpr unsigned notImplemented = 501;
-inline constexpr unsigned unavailable = 503;
-inline constexpr unsigned notExtended = 510;
-
-} // namespace Status
-
 struct HeaderField {
     std::string name;
     std::string value;
 };
 
-// what() is the reason in words, for the client.
+// An answer that says why a request is refused or failed. The body of the answer is what().
 class HttpError : public std::runtime_error {
 public:
-    // The CIMError is what the header of that name says; empty for none.
+    // The CIMError is the value of the header field of that name; empty for none.
     HttpError(unsigned status, const std::string& reason, std::string_view cimError = {},
         std::vector<HeaderField> fields = {});
     explicit HttpError(const CimXml::RequestError& error);
 
     unsigned status() const noexcept { return status_; }
     const std::string& cimError() const noexcept { return cimError_; }
-    // More for the head of the answer.
+    // Further header fields of the answer.
     const std::vector<HeaderField>& fields() const noexcept { return fields_; }
-    // Whether the connection is closed behind the answer.
+    // Returns whether the connection is closed after the answer.
     bool endsConnection() const noexcept { return endsConnection_; }
 
     // One that ends the connection: where the request ends is in doubt, or the client shall go.

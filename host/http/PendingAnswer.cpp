@@ -30,7 +30,7 @@ void PendingAnswer::begin(std::unique_ptr<CimXml::Answer> answer, UnsentObjects&
     if (share_)
         return;
     drop();
-    throw HttpError::closing(Status::unavailable,
+    throw HttpError::closing(MHD_HTTP_SERVICE_UNAVAILABLE,
         "clients have yet to fetch answers with so many objects that there is no room for more",
         {{"Retry-After", "1"}});
 }

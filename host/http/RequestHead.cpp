@@ -3,34 +3,25 @@
 #include "host/http/RequestHead.h"
 
 #include "host/broker/Names.h"
+#include "platform/text/Trim.h"
+
+#include <microhttpd.h>
 
 #include <algorithm>
 
 namespace Host::Http {
 
-bool isToken(std::string_view text)
+namespace {
+
+// Returns the text up to the separator, without white space, and removes both.
+std::string_view takeUntil(char separator, std::string_view& text)
 {
-    constexpr std::string_view punctuation = "!#$%&'*+-.^_`|~";
-    return !text.empty() && std::all_of(text.begin(), text.end(), [&](char c) {
-        return (c >= '0' && c <= '9') || (foldCase(c) >= 'a' && foldCase(c) <= 'z') ||
-               punctuation.find(c) != std::string_view::npos;
-    });
+    const std::string_view part = text.substr(0, text.find(separator));
+    text.remove_prefix(std::min(part.size() + 1, text.size()));
+    return Text::trimmed(part, " \t");
 }
 
-std::string_view withoutBlanks(std::string_view text)
-{
-    const std::size_t first = text.find_first_not_of(" \t");
-    if (first == std::string_view::npos)
-        return {};
-    return text.substr(first, text.find_last_not_of(" \t") - first + 1);
-}
-
-std::string_view withoutQuotes(std::string_view text)
-{
-    if (text.size() >= 2 && text.starts_with('"') && text.ends_with('"'))
-        return text.substr(1, text.size() - 2);
-    return text;
-}
+} // namespace
 
 std::optional<std::string_view> RequestHead::find(std::string_view name) const
 {
@@ -40,10 +31,30 @@ std::optional<std::string_view> RequestHead::find(std::string_view name) const
             continue;
         if (value)
             throw HttpError::closing(
-                Status::badRequest, "the header field " + std::string(name) + " is there twice");
-        value = withoutBlanks(field.value);
+                MHD_HTTP_BAD_REQUEST, "the header field " + std::string(name) + " is there twice");
+        value = Text::trimmed(field.value, " \t");
     }
     return value;
+}
+
+ParameterizedValue parseParameters(std::string_view text)
+{
+    ParameterizedValue result{takeUntil(';', text), {}};
+    while (!text.empty()) {
+        std::string_view parameter = takeUntil(';', text);
+        if (parameter.find('=') == std::string_view::npos)
+            continue;
+        const std::string_view name = takeUntil('=', parameter);
+        result.parameters.push_back({name, Text::trimmed(parameter, " \t")});
+    }
+    return result;
+}
+
+std::string_view withoutQuotes(std::string_view text)
+{
+    if (text.size() >= 2 && text.starts_with('"') && text.ends_with('"'))
+        return text.substr(1, text.size() - 2);
+    return text;
 }
 
 } // namespace Host::Http

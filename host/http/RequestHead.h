@@ -1,7 +1,5 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The first line of a request and its header fields.
-
 #pragma once
 
 #include "host/http/HttpError.h"
@@ -13,24 +11,34 @@
 
 namespace Host::Http {
 
+// The request line and the header fields.
 struct RequestHead {
     std::string method;
     std::string target;  // as the client spells it, such as /cimom
     std::string version; // such as HTTP/1.1
     std::vector<HeaderField> fields;
 
-    // The value without white space at its ends. Names know no letter case. Throws HttpError
-    // when the field is there more than once.
+    // Returns the value of a field without white space at its ends. The letter case of the name
+    // does not matter. Throws HttpError when there are several fields of that name.
     std::optional<std::string_view> find(std::string_view name) const;
 };
 
-// Whether the text can be the name of a header field.
-bool isToken(std::string_view text);
+// A value with parameters, such as `text/xml; charset=utf-8` (RFC 9110, 5.6.6). Refers to the text
+// that it was parsed from.
+struct ParameterizedValue {
+    struct Parameter {
+        std::string_view name;
+        std::string_view value;
+    };
 
-// Without spaces and tabs at its ends.
-std::string_view withoutBlanks(std::string_view text);
+    std::string_view value;
+    std::vector<Parameter> parameters;
+};
 
-// Without the quotation marks, where there is one at each end.
+// Ignores parameters without an equals sign.
+ParameterizedValue parseParameters(std::string_view text);
+
+// Returns the content of a quoted string, and any other text as it is.
 std::string_view withoutQuotes(std::string_view text);
 
 } // namespace Host::Http

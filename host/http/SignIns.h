@@ -1,13 +1,18 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Whether a client may go on.
+// Who may sign in, who did so lately, and how long those who fail wait.
 
 #pragma once
 
+#include "host/http/BasicCredentials.h"
 #include "host/http/Passwords.h"
-#include "host/http/SignInDelays.h"
-#include "host/http/SignInMemory.h"
 
+#include <algorithm>
+#include <array>
+#include <chrono>
+#include <cstddef>
+#include <cstdint>
+#include <map>
 #include <memory>
 #include <mutex>
 #include <optional>
@@ -15,52 +20,103 @@
 
 namespace Host::Http {
 
-// Thread-safe.
+// The sign-ins that succeeded lately, since a password hash is too costly for every request. Keeps
+// no password, but a hash under a key that exists in this process's memory only. A sign-in from one
+// address does not count for others, so that the log names every address.
+class SignInMemory {
+public:
+    using Time = std::chrono::steady_clock::time_point;
+
+    static constexpr std::size_t capacity = 256;
+    static constexpr std::chrono::minutes lifetime{5};
+
+    // Throws std::runtime_error when the system provides no random key.
+    SignInMemory();
+
+    bool knows(const Credentials& credentials, const std::string& address, Time now) const;
+    // Returns whether they were not known.
+    bool remember(const Credentials& credentials, const std::string& address, Time now);
+    void forgetAll() { until_.clear(); }
+
+private:
+    using Digest = std::array<std::uint8_t, 32>;
+
+    Digest digestOf(const Credentials& credentials, const std::string& address) const;
+
+    std::array<std::uint8_t, 32> key_{};
+    std::map<Digest, Time> until_;
+};
+
+// The time before which no password is tried, for each address, however many connections it has.
+// Each failure postpones it, and doubles the delay of the next.
+class SignInDelays {
+public:
+    using Time = std::chrono::steady_clock::time_point;
+    using Duration = std::chrono::steady_clock::duration;
+
+    static constexpr std::size_t capacity = 4096;     // addresses
+    static constexpr std::chrono::minutes memory{15}; // of an address without further failures
+    static constexpr unsigned maximumDoublings = 5;
+
+    explicit SignInDelays(Duration first) : first_(first) {}
+
+    // Returns when a password from the address may be tried. Where that is now, and there were
+    // failures before, the next password waits as if this one had failed already: several
+    // connections guess no faster than one.
+    Time admit(const std::string& address, Time now);
+    // Counts a failure. Returns when the client may be told.
+    Time fail(const std::string& address, Time now);
+
+    std::size_t size() const { return failures_.size(); }
+
+private:
+    struct Failures {
+        unsigned count = 0;
+        Time notBefore{};
+        Time last{};
+    };
+
+    static bool isOld(const Failures& failures, Time now) { return now - failures.last > memory; }
+    Duration delayAfter(const Failures& failures) const
+    {
+        return first_ * (1U << std::min(failures.count, maximumDoublings));
+    }
+
+    Duration first_;
+    std::map<std::string, Failures> failures_; // by address
+};
+
+// The passwords, the memory and the delays of a server. Thread-safe.
 class SignIns {
 public:
-    using Time = SignInMemory::Time;
+    using Time = std::chrono::steady_clock::time_point;
 
-    // Without passwords nobody needs to sign in.
+    // Without passwords no client must sign in.
     SignIns(std::shared_ptr<const Passwords> passwords, SignInDelays::Duration firstDelay)
         : passwords_(std::move(passwords)), delays_(firstDelay)
     {
     }
 
-    bool areDemanded() const;
-    // Who signed in before must do so again.
+    bool areDemanded() const { return passwords() != nullptr; }
+    // Forgets who signed in.
     void replacePasswords(std::shared_ptr<const Passwords> passwords);
 
-    // Quick. Who signed in lately from this address.
-    bool isKnown(const Credentials& credentials, const std::string& address, Time now)
-    {
-        return memory_.knows(credentials, address, now);
-    }
-    // When a password from the neighbourhood may be tried.
-    Time admission(const std::string& neighbourhood, Time now)
-    {
-        return delays_.admission(neighbourhood, now);
-    }
-    // The same for one that is tried now if it may be.
-    Time admit(const std::string& neighbourhood, Time now)
-    {
-        return delays_.admit(neighbourhood, now);
-    }
-    // Takes long. Nothing when the password is right, or none is demanded any more; for a wrong
-    // one, when the client may hear of it. Both go to the log with the address, the right one when
-    // it was not known. The time is counted from now, the beginning, so that it does not tell how
-    // long the user's hash took.
+    // Returns whether the client signed in lately from this address. Takes no hash.
+    bool isKnown(const Credentials& credentials, const std::string& address, Time now) const;
+    // Returns when a password from the neighbourhood may be tried (see SignInDelays).
+    Time admit(const std::string& neighbourhood, Time now);
+    // Checks the password against its hash, which takes long. Returns nothing when it is right or
+    // none is demanded any more. For a wrong one, returns when the client may be told: counted from
+    // now, the beginning, so that the time does not tell what the user's hash cost. The log names
+    // the user and the address, once for a right password that stays known.
     std::optional<Time> tryPassword(const Credentials& credentials, const std::string& address,
         const std::string& neighbourhood, Time now);
 
 private:
-    // Whether they were not known. Does not remember them when the passwords have changed
-    // meanwhile.
-    bool remember(const Credentials& credentials, const std::string& address,
-        const std::shared_ptr<const Passwords>& tried);
     std::shared_ptr<const Passwords> passwords() const;
 
     mutable std::mutex mutex_;
-    std::shared_ptr<const Passwords> passwords_; // null when nobody needs to sign in
+    std::shared_ptr<const Passwords> passwords_; // null when no client must sign in
     SignInMemory memory_;
     SignInDelays delays_;
 };

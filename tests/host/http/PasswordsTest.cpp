@@ -3,7 +3,6 @@
 // Password files and the hashes in them.
 
 #include "host/http/Passwords.h"
-#include "host/http/PasswordHash.h"
 #include "tests/host/http/Hashes.h"
 #include "tests/support/Requirement.h"
 #include "tests/support/TemporaryFolder.h"

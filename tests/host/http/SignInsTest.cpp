@@ -3,7 +3,6 @@
 // What is known of those who sign in, without sockets.
 
 #include "host/http/SignIns.h"
-#include "host/http/BasicCredentials.h"
 #include "tests/host/http/Hashes.h"
 
 #include <gtest/gtest.h>
@@ -60,17 +59,17 @@ TEST(SignInDelaysTest, GrowWithEachFailureOfAnAddress)
 {
     SignInDelays delays(1s);
     const SignInDelays::Time start{};
-    EXPECT_EQ(delays.admission("a", start), start);
-    EXPECT_EQ(delays.failed("a", start), start + 1s);
-    EXPECT_EQ(delays.admission("a", start), start + 1s);
-    EXPECT_EQ(delays.admission("b", start), start);
-    EXPECT_EQ(delays.failed("a", start + 1s), start + 3s);
-    EXPECT_EQ(delays.failed("a", start + 3s), start + 7s);
+    EXPECT_EQ(delays.admit("a", start), start);
+    EXPECT_EQ(delays.fail("a", start), start + 1s);
+    EXPECT_EQ(delays.admit("a", start), start + 1s);
+    EXPECT_EQ(delays.admit("b", start), start);
+    EXPECT_EQ(delays.fail("a", start + 1s), start + 3s);
+    EXPECT_EQ(delays.fail("a", start + 3s), start + 7s);
     for (int i = 0; i < 10; ++i)
-        delays.failed("a", start + 10s);
-    EXPECT_EQ(delays.admission("a", start + 10s), start + 42s);
+        delays.fail("a", start + 10s);
+    EXPECT_EQ(delays.admit("a", start + 10s), start + 42s);
     const auto later = start + 10s + SignInDelays::memory + 1s;
-    EXPECT_EQ(delays.failed("a", later), later + 1s);
+    EXPECT_EQ(delays.fail("a", later), later + 1s);
 }
 
 TEST(SignInDelaysTest, AfterAFailureOneIsTriedAtATime)
@@ -79,11 +78,11 @@ TEST(SignInDelaysTest, AfterAFailureOneIsTriedAtATime)
     const SignInDelays::Time start{};
     EXPECT_EQ(delays.admit("a", start), start);
     EXPECT_EQ(delays.admit("a", start), start);
-    EXPECT_EQ(delays.failed("a", start), start + 1s);
+    EXPECT_EQ(delays.fail("a", start), start + 1s);
     EXPECT_EQ(delays.admit("a", start), start + 1s);
     EXPECT_EQ(delays.admit("a", start + 1s), start + 1s);
     EXPECT_EQ(delays.admit("a", start + 1s), start + 3s);
-    EXPECT_EQ(delays.failed("a", start + 1s), start + 3s);
+    EXPECT_EQ(delays.fail("a", start + 1s), start + 3s);
     EXPECT_EQ(delays.admit("b", start), start);
     const auto later = start + SignInDelays::memory + 2s;
     EXPECT_EQ(delays.admit("a", later), later);
@@ -95,10 +94,10 @@ TEST(SignInDelaysTest, AreKeptForSoManyAddressesOnly)
     SignInDelays delays(1s);
     const SignInDelays::Time start{};
     for (std::size_t i = 0; i < SignInDelays::capacity + 10; ++i)
-        delays.failed(std::to_string(i), start + std::chrono::milliseconds(i));
+        delays.fail(std::to_string(i), start + std::chrono::milliseconds(i));
     EXPECT_EQ(delays.size(), SignInDelays::capacity);
-    EXPECT_EQ(delays.admission("0", start), start);
-    EXPECT_GT(delays.admission("20", start), start);
+    EXPECT_EQ(delays.admit("0", start), start);
+    EXPECT_GT(delays.admit("20", start), start);
 }
 
 TEST(SignInsTest, RefusalsAreTimedFromTheBeginning)
