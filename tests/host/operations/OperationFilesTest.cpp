@@ -1,10 +1,11 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Requests in files with the answers that are expected, for each operation and its options.
+// Requests in files with the responses that are expected, for each operation and its options.
 //
-// NAME.xml is a request, NAME.expected.xml its answer with the elements on lines of their own.
-// In both @SYSTEM@ stands for the kernel's host name and @CONTEXT@ for the context of the open
-// enumeration. `<!-- after OTHER.xml -->` in a request: the other one is made before it.
+// NAME.xml holds a request, the line `<!-- response -->` and the response with the elements on
+// lines of their own. In both @SYSTEM@ stands for the kernel's host name and @CONTEXT@ for the
+// context of the open enumeration. `<!-- after OTHER.xml -->` in a request: the request of the
+// other file is sent before it.
 
 #include "host/cimxml/OperationTable.h"
 #include "platform/utilities/ProviderUtilities.h"
@@ -49,55 +50,68 @@ std::string unfolded(const std::string& text)
     return whole;
 }
 
-std::vector<std::string> requests()
+struct Exchange {
+    std::string request;
+    std::string response;
+};
+
+Exchange exchangeIn(const std::filesystem::path& file)
+{
+    constexpr std::string_view separator = "<!-- response -->\n";
+    const std::string content = contentOf(file);
+    const auto end = content.find(separator);
+    if (end == std::string::npos)
+        throw std::invalid_argument(file.string() + " has no response");
+    return {content.substr(0, end), content.substr(end + separator.size())};
+}
+
+std::vector<std::string> exchangeNames()
 {
     std::vector<std::string> names;
     for (const auto& entry : std::filesystem::directory_iterator(Folder))
-        if (entry.path().filename().string().find(".expected.") == std::string::npos)
-            names.push_back(entry.path().stem().string());
+        names.push_back(entry.path().stem().string());
     std::sort(names.begin(), names.end());
     return names;
 }
 
-class AnswerFilesTest : public testing::TestWithParam<std::string> {
+class OperationFilesTest : public testing::TestWithParam<std::string> {
 protected:
     std::string filledIn(const std::string& text) const
     {
         return replaced(replaced(text, "@SYSTEM@", Vorn::getSystemName()), "@CONTEXT@", context_);
     }
 
-    std::string answerToFile(const std::string& name)
+    std::string responseTo(const std::string& request)
     {
-        const std::string request = contentOf(Folder / name);
         const std::string before = between(request, "<!-- after ", " -->");
         if (!before.empty())
-            answerToFile(before);
-        const std::string answer = answerTo(*manager_, filledIn(request));
-        if (const std::string context = contextIn(answer); !context.empty())
+            responseTo(exchangeIn(Folder / before).request);
+        const std::string response = answerTo(*manager_, filledIn(request));
+        if (const std::string context = contextIn(response); !context.empty())
             context_ = context;
-        return answer;
+        return response;
     }
 
     ShippedManager manager_;
     std::string context_;
 };
 
-TEST_P(AnswerFilesTest, theAnswerIsTheExpectedOne)
+TEST_P(OperationFilesTest, ResponseIsTheExpectedOne)
 {
-    const std::string answer = answerToFile(GetParam() + ".xml");
-    const std::string expected = filledIn(contentOf(Folder / (GetParam() + ".expected.xml")));
-    EXPECT_EQ(unfolded(answer), unfolded(expected));
+    const Exchange exchange = exchangeIn(Folder / (GetParam() + ".xml"));
+    const std::string response = responseTo(exchange.request);
+    EXPECT_EQ(unfolded(response), unfolded(filledIn(exchange.response)));
 }
 
-INSTANTIATE_TEST_SUITE_P(Files, AnswerFilesTest, testing::ValuesIn(requests()),
+INSTANTIATE_TEST_SUITE_P(Files, OperationFilesTest, testing::ValuesIn(exchangeNames()),
     [](const auto& file) { return replaced(file.param, "-", "_"); });
 
-TEST(AnswerFiles, coverEveryOperationWithEachOfItsParameters)
+TEST(OperationFilesCoverageTest, HasEveryOperationWithEachOfItsParameters)
 {
     using Host::CimXml::Parameter;
     std::map<std::string, std::string> textsByOperation;
-    for (const std::string& name : requests()) {
-        const std::string text = contentOf(Folder / (name + ".xml"));
+    for (const std::string& name : exchangeNames()) {
+        const std::string text = exchangeIn(Folder / (name + ".xml")).request;
         textsByOperation[between(text, "<IMETHODCALL NAME=\"", "\"")] += text;
     }
     for (const char* const operation :
