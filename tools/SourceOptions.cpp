@@ -2,7 +2,8 @@
 
 #include "tools/SourceOptions.h"
 
-#include "platform/instrumentation/ModelFile.h"
+#include "platform/instrumentation/SourceList.h"
+#include "platform/instrumentation/machinefile/MachineFileSource.h"
 #include "tools/cim/ProviderFile.h"
 
 #include <CLI/CLI.hpp>
@@ -30,8 +31,9 @@ void SourceOptions::selectMachine() const
     if (!model_)
         return;
     // The provider would answer a model it cannot read with nothing.
-    Vorn::checkModelFile(*model_);
-    const std::string entry = Vorn::modelFileEntry(std::filesystem::absolute(*model_).string());
+    Vorn::checkMachineFile(*model_);
+    const std::string entry =
+        Vorn::formatSourceEntry("model", std::filesystem::absolute(*model_).string());
     ::setenv("VORN_INSTRUMENTATION", entry.c_str(), 1);
 }
 

@@ -3,7 +3,7 @@
 #include "platform/instrumentation/Recorder.h"
 
 #include "platform/instrumentation/Instrumentation.h"
-#include "platform/instrumentation/model/ModelWriter.h"
+#include "platform/instrumentation/machinefile/MachineFileWriter.h"
 
 #include <set>
 
@@ -48,9 +48,9 @@ std::string uniquePath(const std::string& path, std::set<std::string>& known)
 
 } // namespace
 
-std::string recordModel()
+std::string recordMachineFile()
 {
-    std::vector<ModelNode> nodes;
+    std::vector<MachineFileNode> nodes;
     std::set<std::string> paths;
     for (const NodeType type : {NodeType::Temperature, NodeType::Voltage, NodeType::Tachometer}) {
         Instrumentation cursor;
@@ -58,7 +58,7 @@ std::string recordModel()
             nodes.push_back({type, uniquePath(cursor.getPathToNode(), paths),
                 cursor.getNodeDescription(), cursor.getSensorType(), readingOf(cursor)});
     }
-    return writeModel(nodes);
+    return writeMachineFile(nodes);
 }
 
 } // namespace Vorn

@@ -12,6 +12,6 @@ namespace Vorn {
 // voltages, then tachometers, each with its present values; a value that is not finite is left
 // out. A path that came up before is followed by "#2", "#3" and so on, since paths in a model are
 // unique. Throws what Vorn::Instrumentation throws.
-std::string recordModel();
+std::string recordMachineFile();
 
 } // namespace Vorn

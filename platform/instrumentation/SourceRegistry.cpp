@@ -3,7 +3,7 @@
 #include "platform/instrumentation/SourceRegistry.h"
 
 #include "platform/instrumentation/hwmon/HwmonSource.h"
-#include "platform/instrumentation/model/ModelSource.h"
+#include "platform/instrumentation/machinefile/MachineFileSource.h"
 
 #include <map>
 #include <mutex>
@@ -25,7 +25,7 @@ std::unique_ptr<Source> openModel(const std::string& argument)
 {
     if (argument.empty())
         throw std::runtime_error("source \"model\" names no file: write model:FILE");
-    return std::make_unique<ModelSource>(argument);
+    return std::make_unique<MachineFileSource>(argument);
 }
 
 class Registry {

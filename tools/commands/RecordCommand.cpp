@@ -33,7 +33,7 @@ public:
     ExitCode run(Output& out) override
     {
         source_.selectMachine();
-        const std::string recording = escapeUnprintable(Vorn::recordModel());
+        const std::string recording = escapeUnprintable(Vorn::recordMachineFile());
         if (file_ && *file_ != "-")
             replaceFile(*file_, recording);
         else

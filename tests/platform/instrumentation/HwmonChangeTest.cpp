@@ -4,7 +4,7 @@
 
 #include "platform/instrumentation/Recorder.h"
 #include "platform/instrumentation/hwmon/HwmonSource.h"
-#include "platform/instrumentation/model/ModelReader.h"
+#include "platform/instrumentation/machinefile/MachineFileReader.h"
 #include "tests/platform/instrumentation/HwmonMachine.h"
 
 #include <gmock/gmock.h>
@@ -130,7 +130,7 @@ TEST_F(HwmonChange, aRecordedMachineReplaysToTheSameNodes)
     for (const std::string tree : {"desktop", "server", "hotplug"}) {
         const BoundSysfs sysfs(tree);
         const auto nodes = walk();
-        const auto recorded = Vorn::readModel(Vorn::recordModel());
+        const auto recorded = Vorn::readMachineFile(Vorn::recordMachineFile());
         ASSERT_EQ(recorded.size(), nodes.size());
         for (std::size_t at = 0; at < nodes.size(); ++at) {
             EXPECT_EQ(recorded[at].path, nodes[at].path);

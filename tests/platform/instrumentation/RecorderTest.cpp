@@ -2,7 +2,7 @@
 
 #include "platform/instrumentation/Recorder.h"
 
-#include "platform/instrumentation/model/ModelReader.h"
+#include "platform/instrumentation/machinefile/MachineFileReader.h"
 #include "tests/platform/instrumentation/Walk.h"
 #include "tests/support/ScriptedMachine.h"
 
@@ -14,14 +14,14 @@ namespace RecorderTests {
 
 using Testing::ScriptedMachine;
 using testing::SizeIs;
-using Vorn::recordModel;
+using Vorn::recordMachineFile;
 using Vorn::NodeLexicon::NodeType;
 
 TEST(Recorder, walksTemperaturesThenVoltagesThenTachometers)
 {
     const ScriptedMachine machine({{NodeType::Tachometer, "/f", "", {}},
         {NodeType::Voltage, "/v", "", {}}, {NodeType::Temperature, "/t", "", {}}});
-    const auto nodes = Vorn::readModel(recordModel());
+    const auto nodes = Vorn::readMachineFile(recordMachineFile());
     ASSERT_THAT(nodes, SizeIs(3));
     EXPECT_EQ(nodes[0].path, "/t");
     EXPECT_EQ(nodes[1].path, "/v");
@@ -34,7 +34,7 @@ TEST(Recorder, leavesOutNumbersThatAreNotFinite)
         {.reading = std::numeric_limits<double>::quiet_NaN(),
             .lowerCritical = 1.5,
             .upperCritical = std::numeric_limits<double>::infinity()}}});
-    const auto nodes = Vorn::readModel(recordModel());
+    const auto nodes = Vorn::readMachineFile(recordMachineFile());
     EXPECT_FALSE(nodes.at(0).values.reading);
     EXPECT_FALSE(nodes.at(0).values.upperCritical);
     EXPECT_EQ(nodes.at(0).values.lowerCritical, 1.5);
@@ -44,7 +44,7 @@ TEST(Recorder, makesPathsUnique)
 {
     const ScriptedMachine machine({{NodeType::Voltage, "/v", "1", {}},
         {NodeType::Voltage, "/v", "2", {}}, {NodeType::Tachometer, "/v", "3", {}}});
-    const auto nodes = Vorn::readModel(recordModel());
+    const auto nodes = Vorn::readMachineFile(recordMachineFile());
     ASSERT_THAT(nodes, SizeIs(3));
     EXPECT_EQ(nodes[0].path, "/v");
     EXPECT_EQ(nodes[1].path, "/v#2");
@@ -54,7 +54,7 @@ TEST(Recorder, makesPathsUnique)
 TEST(Recorder, makesTextsValid)
 {
     const ScriptedMachine machine({{NodeType::Voltage, "/\xFF", "a\xFE", {}}});
-    const auto nodes = Vorn::readModel(recordModel());
+    const auto nodes = Vorn::readMachineFile(recordMachineFile());
     EXPECT_EQ(nodes.at(0).path, "/\xEF\xBF\xBD");
     EXPECT_EQ(nodes.at(0).description, "a\xEF\xBF\xBD");
 }
@@ -63,7 +63,7 @@ TEST(Recorder, passesOnTheErrorOfASource)
 {
     ScriptedMachine machine;
     machine.failConstruction();
-    EXPECT_EQ(Testing::errorOf([] { recordModel(); }), "scripted: construction");
+    EXPECT_EQ(Testing::errorOf([] { recordMachineFile(); }), "scripted: construction");
 }
 
 } // namespace RecorderTests

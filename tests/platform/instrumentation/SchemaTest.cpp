@@ -2,9 +2,10 @@
 
 // The files that describe models to people and tools, against the reader.
 
-#include "platform/instrumentation/ModelFile.h"
+#include "platform/instrumentation/SourceList.h"
 #include "platform/instrumentation/hwmon/Status.h"
-#include "platform/instrumentation/model/ModelMembers.h"
+#include "platform/instrumentation/machinefile/MachineFileMembers.h"
+#include "platform/instrumentation/machinefile/MachineFileSource.h"
 #include "tests/platform/instrumentation/Walk.h"
 #include "tests/support/Environment.h"
 
@@ -19,7 +20,7 @@ namespace SchemaTests {
 
 using Testing::SeenNode;
 using testing::UnorderedElementsAreArray;
-namespace Member = Vorn::ModelMember;
+namespace Member = Vorn::MachineFileMember;
 
 const std::string folder = SENSOR_PROFILE_SOURCE_DIR "/schema/";
 
@@ -32,7 +33,7 @@ nlohmann::json schema()
 std::vector<SeenNode> demoMachine()
 {
     const Testing::EnvironmentVariable environment(
-        "VORN_INSTRUMENTATION", Vorn::modelFileEntry(folder + "demo-model.json"));
+        "VORN_INSTRUMENTATION", Vorn::formatSourceEntry("model", folder + "demo-model.json"));
     return Testing::walk();
 }
 

@@ -2,7 +2,7 @@
 
 #include "platform/instrumentation/SourceList.h"
 
-#include "platform/instrumentation/ModelFile.h"
+#include "platform/instrumentation/machinefile/MachineFileSource.h"
 #include "tests/platform/instrumentation/Walk.h"
 
 #include <gmock/gmock.h>
@@ -36,7 +36,7 @@ TEST(SourceList, takesACommaAfterABackslashForPartOfTheName)
 TEST(SourceList, readsBackEveryFileName)
 {
     for (const std::string name : {"/a.json", "/a,b", R"(/a\b)", R"(\,\)", "a:b", " "}) {
-        const auto entries = parseSourceList(Vorn::modelFileEntry(name));
+        const auto entries = parseSourceList(Vorn::formatSourceEntry("model", name));
         ASSERT_EQ(entries.size(), 1U) << name;
         EXPECT_EQ(entries[0].scheme, "model");
         EXPECT_EQ(entries[0].argument, name);

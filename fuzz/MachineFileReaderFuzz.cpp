@@ -3,8 +3,8 @@
 // Whatever bytes a model file holds, the reader gives nodes or a std::runtime_error; and what
 // it read and the writer wrote, it reads back as the same.
 
-#include "platform/instrumentation/model/ModelReader.h"
-#include "platform/instrumentation/model/ModelWriter.h"
+#include "platform/instrumentation/machinefile/MachineFileReader.h"
+#include "platform/instrumentation/machinefile/MachineFileWriter.h"
 
 #include <cstddef>
 #include <cstdint>
@@ -14,25 +14,25 @@
 
 namespace {
 
-std::optional<std::vector<Vorn::ModelNode>> tryRead(std::string_view text)
+std::optional<std::vector<Vorn::MachineFileNode>> tryRead(std::string_view text)
 {
     try {
-        return Vorn::readModel(text);
+        return Vorn::readMachineFile(text);
     } catch (const std::runtime_error&) {
         return std::nullopt;
     }
 }
 
-bool isSame(const Vorn::ModelNode& left, const Vorn::ModelNode& right)
+bool isSame(const Vorn::MachineFileNode& left, const Vorn::MachineFileNode& right)
 {
     return left.type == right.type && left.path == right.path &&
            left.description == right.description && left.sensorType == right.sensorType &&
            left.values == right.values;
 }
 
-void requireRoundTrip(const std::vector<Vorn::ModelNode>& nodes)
+void requireRoundTrip(const std::vector<Vorn::MachineFileNode>& nodes)
 {
-    const auto again = tryRead(Vorn::writeModel(nodes));
+    const auto again = tryRead(Vorn::writeMachineFile(nodes));
     if (!again || again->size() != nodes.size())
         std::abort();
     for (std::size_t at = 0; at < nodes.size(); ++at)

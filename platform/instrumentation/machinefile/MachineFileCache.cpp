@@ -1,9 +1,9 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-#include "platform/instrumentation/model/ModelCache.h"
+#include "platform/instrumentation/machinefile/MachineFileCache.h"
 
 #include "platform/instrumentation/RegularFile.h"
-#include "platform/instrumentation/model/ModelReader.h"
+#include "platform/instrumentation/machinefile/MachineFileReader.h"
 
 #include <stdexcept>
 
@@ -12,32 +12,32 @@ namespace Vorn {
 namespace {
 
 // A process serves one machine, a test a few.
-constexpr std::size_t mostFiles = 8;
+constexpr std::size_t maximumFiles = 8;
 
-// A million sensors; more is a mistake.
-constexpr std::size_t mostBytes = std::size_t{256} << 20U;
+// A kilobyte for each of 65,535 sensors.
+constexpr std::size_t maximumBytes = std::size_t{64} << 20U;
 
 } // namespace
 
-ModelCache& ModelCache::instance()
+MachineFileCache& MachineFileCache::instance()
 {
-    static ModelCache cache;
+    static MachineFileCache cache;
     return cache;
 }
 
-std::shared_ptr<const Model> ModelCache::load(const std::string& path)
+MachineFileCache::Nodes MachineFileCache::load(const std::string& path)
 {
     try {
         const Outcome outcome = find(path);
-        if (outcome.model == nullptr)
+        if (outcome.nodes == nullptr)
             throw std::runtime_error(outcome.failure);
-        return outcome.model;
+        return outcome.nodes;
     } catch (const std::runtime_error& error) {
         throw std::runtime_error("model file " + path + ": " + error.what());
     }
 }
 
-ModelCache::Outcome ModelCache::find(const std::string& path)
+MachineFileCache::Outcome MachineFileCache::find(const std::string& path)
 {
     const FileStamp present = stampOfRegularFile(path);
     {
@@ -52,20 +52,21 @@ ModelCache::Outcome ModelCache::find(const std::string& path)
     return outcome;
 }
 
-ModelCache::Outcome ModelCache::read(const std::string& path)
+MachineFileCache::Outcome MachineFileCache::read(const std::string& path)
 {
-    const FileContent file = readRegularFile(path, mostBytes);
+    const FileContent file = readRegularFile(path, maximumBytes);
     try {
-        return {file.stamp, std::make_shared<const Model>(readModel(file.text)), {}};
+        return {file.stamp,
+            std::make_shared<const std::vector<MachineFileNode>>(readMachineFile(file.text)), {}};
     } catch (const std::runtime_error& error) {
         return {file.stamp, nullptr, error.what()};
     }
 }
 
-void ModelCache::keep(const std::string& path, const Outcome& outcome)
+void MachineFileCache::keep(const std::string& path, const Outcome& outcome)
 {
     const std::lock_guard lock(mutex_);
-    if (outcomes_.size() >= mostFiles && !outcomes_.contains(path))
+    if (outcomes_.size() >= maximumFiles && !outcomes_.contains(path))
         outcomes_.clear();
     outcomes_[path] = outcome;
 }

@@ -1,9 +1,10 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-#include "platform/instrumentation/ModelFile.h"
+#include "platform/instrumentation/machinefile/MachineFileSource.h"
 #include "platform/instrumentation/Recorder.h"
 #include "platform/instrumentation/RegularFile.h"
-#include "platform/instrumentation/model/ModelCache.h"
+#include "platform/instrumentation/SourceList.h"
+#include "platform/instrumentation/machinefile/MachineFileCache.h"
 #include "tests/platform/instrumentation/Walk.h"
 #include "tests/support/Environment.h"
 #include "tests/support/LogCapture.h"
@@ -21,7 +22,7 @@
 #include <sys/wait.h>
 #include <unistd.h>
 
-namespace ModelSourceTests {
+namespace MachineFileSourceTests {
 
 using testing::ElementsAre;
 using Testing::EnvironmentVariable;
@@ -30,7 +31,7 @@ using testing::HasSubstr;
 using testing::SizeIs;
 using Testing::TemporaryFolder;
 using Testing::walk;
-using Vorn::checkModelFile;
+using Vorn::checkMachineFile;
 
 std::string modelOf(const std::string& description)
 {
@@ -44,16 +45,17 @@ void letItRest()
     std::this_thread::sleep_for(std::chrono::milliseconds(80));
 }
 
-class ModelFileTest : public testing::Test {
+class MachineFileSourceTest : public testing::Test {
 protected:
     std::string write(const std::string& text) { return folder_.write("model.json", text); }
     std::string path() const { return folder_.path() / "model.json"; }
 
     TemporaryFolder folder_;
-    EnvironmentVariable environment_{"VORN_INSTRUMENTATION", Vorn::modelFileEntry(path())};
+    EnvironmentVariable environment_{
+        "VORN_INSTRUMENTATION", Vorn::formatSourceEntry("model", path())};
 };
 
-TEST_F(ModelFileTest, isServedInItsOwnOrder)
+TEST_F(MachineFileSourceTest, isServedInItsOwnOrder)
 {
     write(R"({"nodes":[
         {"type":"voltage","path":"/1","description":"first","reading":3.3},
@@ -71,7 +73,7 @@ TEST_F(ModelFileTest, isServedInItsOwnOrder)
     EXPECT_EQ(nodes[2].values.status, 1U);
 }
 
-TEST_F(ModelFileTest, isReadAfreshWhenItChanged)
+TEST_F(MachineFileSourceTest, isReadAfreshWhenItChanged)
 {
     for (const std::string description : {"one", "two", "six"}) {
         write(modelOf(description));
@@ -81,7 +83,7 @@ TEST_F(ModelFileTest, isReadAfreshWhenItChanged)
     }
 }
 
-TEST_F(ModelFileTest, isReadAfreshThoughItsTimeWasSetBack)
+TEST_F(MachineFileSourceTest, isReadAfreshThoughItsTimeWasSetBack)
 {
     write(modelOf("one"));
     struct stat status {};
@@ -94,7 +96,7 @@ TEST_F(ModelFileTest, isReadAfreshThoughItsTimeWasSetBack)
     EXPECT_EQ(walk().at(0).description, "two");
 }
 
-TEST_F(ModelFileTest, isReadWhateverTimeItClaims)
+TEST_F(MachineFileSourceTest, isReadWhateverTimeItClaims)
 {
     write(modelOf("one"));
     const timespec farFuture = {10'413'792'000, 999'999'999}; // the year 2300
@@ -106,19 +108,19 @@ TEST_F(ModelFileTest, isReadWhateverTimeItClaims)
     }
 }
 
-TEST_F(ModelFileTest, isNotReadAgainWhileItStays)
+TEST_F(MachineFileSourceTest, isNotReadAgainWhileItStays)
 {
     write(modelOf("one"));
     letItRest();
-    auto& cache = Vorn::ModelCache::instance();
+    auto& cache = Vorn::MachineFileCache::instance();
     const auto first = cache.load(path());
     EXPECT_EQ(cache.load(path()), first);
     write(modelOf("two"));
     EXPECT_NE(cache.load(path()), first);
-    EXPECT_EQ(first->node(0).description, "one");
+    EXPECT_EQ(first->at(0).description, "one");
 }
 
-TEST_F(ModelFileTest, thatJustChangedIsNotTrustedToShowTheNextChange)
+TEST_F(MachineFileSourceTest, thatJustChangedIsNotTrustedToShowTheNextChange)
 {
     write(modelOf("one"));
     EXPECT_FALSE(Vorn::isSettled(Vorn::stampOfRegularFile(path())));
@@ -126,31 +128,32 @@ TEST_F(ModelFileTest, thatJustChangedIsNotTrustedToShowTheNextChange)
     EXPECT_TRUE(Vorn::isSettled(Vorn::stampOfRegularFile(path())));
 }
 
-TEST_F(ModelFileTest, moreFilesThanTheCacheKeepsAreServedAllTheSame)
+TEST_F(MachineFileSourceTest, moreFilesThanTheCacheKeepsAreServedAllTheSame)
 {
     for (int turn = 0; turn < 2; ++turn)
         for (int number = 0; number < 20; ++number) {
             const std::string name = std::to_string(number);
             const std::string file =
                 turn == 0 ? folder_.write(name, modelOf(name)) : (folder_.path() / name).string();
-            EXPECT_EQ(Vorn::ModelCache::instance().load(file)->node(0).description, name);
+            EXPECT_EQ(Vorn::MachineFileCache::instance().load(file)->at(0).description, name);
         }
 }
 
-TEST_F(ModelFileTest, withACommaInItsNameIsServed)
+TEST_F(MachineFileSourceTest, withACommaInItsNameIsServed)
 {
     const std::string file = folder_.write(R"(a,b\c.json)", modelOf("comma"));
-    const EnvironmentVariable environment("VORN_INSTRUMENTATION", Vorn::modelFileEntry(file));
+    const EnvironmentVariable environment(
+        "VORN_INSTRUMENTATION", Vorn::formatSourceEntry("model", file));
     EXPECT_EQ(walk().at(0).description, "comma");
 }
 
-TEST_F(ModelFileTest, errorsNameTheFileThePlaceAndTheReason)
+TEST_F(MachineFileSourceTest, errorsNameTheFileThePlaceAndTheReason)
 {
     const std::string start = "model file " + path() + ": ";
     write(R"({"nodes":[{"status":"x"}]})");
     const std::string shape = start + "/nodes/0/status: expected an unsigned 32-bit integer, found "
                                       "the string \"x\"";
-    EXPECT_EQ(errorOf([&] { checkModelFile(path()); }), shape);
+    EXPECT_EQ(errorOf([&] { checkMachineFile(path()); }), shape);
     EXPECT_EQ(errorOf([] { walk(); }), shape);
     letItRest();
     EXPECT_EQ(errorOf([] { walk(); }), shape);
@@ -158,40 +161,40 @@ TEST_F(ModelFileTest, errorsNameTheFileThePlaceAndTheReason)
     write("{");
     EXPECT_THAT(errorOf([] { walk(); }), HasSubstr(start + "line 1, column 2: "));
     write(modelOf("good"));
-    EXPECT_NO_THROW(checkModelFile(path()));
+    EXPECT_NO_THROW(checkMachineFile(path()));
 }
 
-TEST_F(ModelFileTest, thatIsMissingIsNamed)
+TEST_F(MachineFileSourceTest, thatIsMissingIsNamed)
 {
-    EXPECT_EQ(errorOf([&] { checkModelFile(path()); }),
+    EXPECT_EQ(errorOf([&] { checkMachineFile(path()); }),
         "model file " + path() + ": No such file or directory");
 }
 
-TEST_F(ModelFileTest, thatIsADirectoryIsRefused)
+TEST_F(MachineFileSourceTest, thatIsADirectoryIsRefused)
 {
-    EXPECT_EQ(errorOf([&] { checkModelFile(folder_.path()); }),
+    EXPECT_EQ(errorOf([&] { checkMachineFile(folder_.path()); }),
         "model file " + folder_.path().string() + ": Is a directory");
 }
 
-TEST_F(ModelFileTest, thatIsAPipeOrADeviceIsRefusedWithoutWaiting)
+TEST_F(MachineFileSourceTest, thatIsAPipeOrADeviceIsRefusedWithoutWaiting)
 {
     ASSERT_EQ(mkfifo(path().c_str(), 0600), 0);
+    EXPECT_EQ(errorOf([&] { checkMachineFile(path()); }),
+        "model file " + path() + ": Not a regular file");
     EXPECT_EQ(
-        errorOf([&] { checkModelFile(path()); }), "model file " + path() + ": Not a regular file");
-    EXPECT_EQ(
-        errorOf([] { checkModelFile("/dev/zero"); }), "model file /dev/zero: Not a regular file");
+        errorOf([] { checkMachineFile("/dev/zero"); }), "model file /dev/zero: Not a regular file");
 }
 
-TEST_F(ModelFileTest, thatIsTooLargeIsRefusedUnread)
+TEST_F(MachineFileSourceTest, thatIsTooLargeIsRefusedUnread)
 {
     write("");
     ASSERT_EQ(truncate(path().c_str(), 1LL << 40U), 0);
-    EXPECT_EQ(errorOf([&] { checkModelFile(path()); }),
-        "model file " + path() + ": Larger than 268435456 bytes");
+    EXPECT_EQ(errorOf([&] { checkMachineFile(path()); }),
+        "model file " + path() + ": Larger than 67108864 bytes");
 }
 
 // Root may read everything, so a child that is nobody tries.
-TEST_F(ModelFileTest, thatMayNotBeReadIsNamed)
+TEST_F(MachineFileSourceTest, thatMayNotBeReadIsNamed)
 {
     write(modelOf("secret"));
     ASSERT_EQ(chmod(path().c_str(), 0), 0);
@@ -203,7 +206,7 @@ TEST_F(ModelFileTest, thatMayNotBeReadIsNamed)
         constexpr uid_t nobody = 65534;
         if (geteuid() == 0 && setuid(nobody) != 0)
             _exit(2);
-        _exit(errorOf([&] { checkModelFile(path()); }) == expected ? 0 : 1);
+        _exit(errorOf([&] { checkMachineFile(path()); }) == expected ? 0 : 1);
     }
     int status = 0;
     ASSERT_EQ(waitpid(child, &status, 0), child);
@@ -211,7 +214,7 @@ TEST_F(ModelFileTest, thatMayNotBeReadIsNamed)
     EXPECT_EQ(WEXITSTATUS(status), 0);
 }
 
-TEST_F(ModelFileTest, thatIsMalformedIsReportedOnceUntilItWasGood)
+TEST_F(MachineFileSourceTest, thatIsMalformedIsReportedOnceUntilItWasGood)
 {
     const Testing::LogCapture capture;
     write("{");
@@ -226,7 +229,7 @@ TEST_F(ModelFileTest, thatIsMalformedIsReportedOnceUntilItWasGood)
     EXPECT_THAT(capture.log(), SizeIs(2));
 }
 
-TEST_F(ModelFileTest, isServedToManyThreadsWhileItChanges)
+TEST_F(MachineFileSourceTest, isServedToManyThreadsWhileItChanges)
 {
     const auto replace = [&](const std::string& description) {
         const std::string file = folder_.write("next", modelOf(description));
@@ -249,7 +252,7 @@ TEST_F(ModelFileTest, isServedToManyThreadsWhileItChanges)
     goOn = false;
 }
 
-TEST_F(ModelFileTest, sixtyThousandSensorsAreServed)
+TEST_F(MachineFileSourceTest, sixtyThousandSensorsAreServed)
 {
     std::string text = "{\"nodes\":[";
     for (int number = 0; number < 60'000; ++number)
@@ -263,7 +266,7 @@ TEST_F(ModelFileTest, sixtyThousandSensorsAreServed)
     EXPECT_EQ(nodes.back().path, "/t59999");
 }
 
-TEST_F(ModelFileTest, recordedIsTheSameMachine)
+TEST_F(MachineFileSourceTest, recordedIsTheSameMachine)
 {
     write(R"({"nodes":[
         {"type":"tachometer","path":"/f","description":"Fan \"A\" \\ 温度","status":1,
@@ -273,21 +276,21 @@ TEST_F(ModelFileTest, recordedIsTheSameMachine)
         {"type":"temperature","path":"/t","description":" T ","status":26,"possibleStates":[],
          "upperNonCritical":80.123456789012345,"upperFatal":1e22}]})");
     const auto before = walk();
-    const std::string recorded = Vorn::recordModel();
+    const std::string recorded = Vorn::recordMachineFile();
     write(recorded);
     EXPECT_EQ(walk(), before);
-    EXPECT_EQ(Vorn::recordModel(), recorded);
+    EXPECT_EQ(Vorn::recordMachineFile(), recorded);
 }
 
-TEST_F(ModelFileTest, recordedHasOneLineForEveryNode)
+TEST_F(MachineFileSourceTest, recordedHasOneLineForEveryNode)
 {
     write(modelOf("V"));
-    EXPECT_EQ(Vorn::recordModel(),
+    EXPECT_EQ(Vorn::recordMachineFile(),
         "{ \"nodes\": [\n"
         R"(  {"type":"voltage","path":"/v","description":"V","sensorType":21,"status":0,"reading":1.0})"
         "\n] }\n");
     write(R"({"nodes":[]})");
-    EXPECT_EQ(Vorn::recordModel(), "{ \"nodes\": [\n] }\n");
+    EXPECT_EQ(Vorn::recordMachineFile(), "{ \"nodes\": [\n] }\n");
 }
 
-} // namespace ModelSourceTests
+} // namespace MachineFileSourceTests

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The names by which a model file calls a node's members, shared by reader and writer.
+// The names of a model file's members, for its reader and its writer.
 
 #pragma once
 
@@ -10,7 +10,7 @@
 #include <optional>
 #include <string_view>
 
-namespace Vorn::ModelMember {
+namespace Vorn::MachineFileMember {
 
 inline constexpr std::string_view nodes = "nodes"; // the document's only member
 
@@ -52,4 +52,4 @@ inline constexpr std::array<TypeName, 3> typeNames{{
     {"tachometer", NodeLexicon::NodeType::Tachometer},
 }};
 
-} // namespace Vorn::ModelMember
+} // namespace Vorn::MachineFileMember

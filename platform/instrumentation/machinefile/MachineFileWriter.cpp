@@ -1,8 +1,8 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-#include "platform/instrumentation/model/ModelWriter.h"
+#include "platform/instrumentation/machinefile/MachineFileWriter.h"
 
-#include "platform/instrumentation/model/ModelMembers.h"
+#include "platform/instrumentation/machinefile/MachineFileMembers.h"
 #include "platform/text/Utf8.h"
 
 #include <nlohmann/json.hpp>
@@ -11,11 +11,9 @@
 
 namespace Vorn {
 
-namespace Member = ModelMember;
+namespace Member = MachineFileMember;
 
 namespace {
-
-using Json = nlohmann::ordered_json;
 
 std::string_view nameOf(NodeLexicon::NodeType type)
 {
@@ -25,10 +23,10 @@ std::string_view nameOf(NodeLexicon::NodeType type)
     return {};
 }
 
-Json toJson(const ModelNode& node)
+nlohmann::ordered_json toJson(const MachineFileNode& node)
 {
-    Json json;
-    const auto set = [&](std::string_view name, Json value) {
+    nlohmann::ordered_json json;
+    const auto set = [&](std::string_view name, nlohmann::ordered_json value) {
         json[std::string(name)] = std::move(value);
     };
     set(Member::type, nameOf(node.type));
@@ -48,10 +46,10 @@ Json toJson(const ModelNode& node)
 
 } // namespace
 
-std::string writeModel(const std::vector<ModelNode>& nodes)
+std::string writeMachineFile(const std::vector<MachineFileNode>& nodes)
 {
     std::string text = "{ \"nodes\": [";
-    for (const ModelNode& node : nodes)
+    for (const MachineFileNode& node : nodes)
         text += (&node == nodes.data() ? "\n  " : ",\n  ") + toJson(node).dump();
     return text + "\n] }\n";
 }

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-#include "platform/instrumentation/model/ModelReader.h"
+#include "platform/instrumentation/machinefile/MachineFileReader.h"
 
 #include "tests/platform/instrumentation/Walk.h"
 #include "tests/support/Environment.h"
@@ -14,7 +14,7 @@
 #include <stdexcept>
 #include <tuple>
 
-namespace ModelReaderTests {
+namespace MachineFileReaderTests {
 
 using namespace std::string_literals;
 using testing::ElementsAre;
@@ -23,8 +23,8 @@ using testing::HasSubstr;
 using testing::IsEmpty;
 using testing::SizeIs;
 using testing::StartsWith;
-using Vorn::ModelNode;
-using Vorn::readModel;
+using Vorn::MachineFileNode;
+using Vorn::readMachineFile;
 using Vorn::NodeLexicon::NodeType;
 
 // A document with one node that has the required members and these.
@@ -34,20 +34,20 @@ std::string nodeWith(const std::string& members)
            (members.empty() ? "" : "," + members) + "}]}";
 }
 
-ModelNode nodeOf(const std::string& members)
+MachineFileNode nodeOf(const std::string& members)
 {
-    return readModel(nodeWith(members)).at(0);
+    return readMachineFile(nodeWith(members)).at(0);
 }
 
 TEST(Model, holdsEveryMember)
 {
-    const auto nodes = readModel(R"({ "nodes": [
+    const auto nodes = readMachineFile(R"({ "nodes": [
       { "type": "temperature", "path": "/board/cpu0/temp1", "description": "CPU 1 Temp",
         "sensorType": 23, "status": 1, "possibleStates": [1, 23, 26], "baseUnits": 2,
         "reading": 41.5, "lowerNonCritical": 5, "upperNonCritical": 80, "lowerCritical": 0,
         "upperCritical": 95, "lowerFatal": -10, "upperFatal": 105 } ] })");
     ASSERT_THAT(nodes, SizeIs(1));
-    const ModelNode& node = nodes[0];
+    const MachineFileNode& node = nodes[0];
     EXPECT_EQ(node.type, NodeType::Temperature);
     EXPECT_EQ(node.path, "/board/cpu0/temp1");
     EXPECT_EQ(node.description, "CPU 1 Temp");
@@ -73,7 +73,7 @@ TEST(Model, leavesOutWhatIsNotThere)
 
 TEST(Model, takesTheTypesNumberForTheSensorType)
 {
-    const auto nodes = readModel(R"({"nodes":[
+    const auto nodes = readMachineFile(R"({"nodes":[
         {"path":"/1","description":"","type":"temperature"},
         {"path":"/2","description":"","type":"voltage"},
         {"path":"/3","description":"","type":"tachometer"}]})");
@@ -86,8 +86,8 @@ TEST(Model, takesTheTypesNumberForTheSensorType)
 
 TEST(Model, mayBeEmpty)
 {
-    EXPECT_THAT(readModel(R"({"nodes":[]})"), IsEmpty());
-    EXPECT_THAT(readModel("\xEF\xBB\xBF{\"nodes\":[]}\n"), IsEmpty());
+    EXPECT_THAT(readMachineFile(R"({"nodes":[]})"), IsEmpty());
+    EXPECT_THAT(readMachineFile("\xEF\xBB\xBF{\"nodes\":[]}\n"), IsEmpty());
 }
 
 TEST(Model, readsNumbersOfEveryForm)
@@ -130,7 +130,7 @@ TEST(Model, readsNumbersAlikeInAProcessWithADecimalComma)
 
 TEST(Model, keepsTextsAsTheyStand)
 {
-    const auto nodes = readModel(
+    const auto nodes = readMachineFile(
         R"({"nodes":[{"type":"voltage","path":"/\u00e4/\"\\","description":" 温度 \ud83c\udf21 "}]})");
     EXPECT_EQ(nodes.at(0).path, "/\u00E4/\"\\");
     EXPECT_EQ(nodes.at(0).description, " \u6E29\u5EA6 \U0001F321 ");
@@ -145,7 +145,7 @@ class RefusedModel : public testing::TestWithParam<Refusal> {};
 
 TEST_P(RefusedModel, namesThePlaceAndTheReason)
 {
-    EXPECT_EQ(errorOf([&] { readModel(GetParam().document); }), GetParam().error);
+    EXPECT_EQ(errorOf([&] { readMachineFile(GetParam().document); }), GetParam().error);
 }
 
 const std::string code = "an unsigned 32-bit integer";
@@ -238,48 +238,50 @@ TEST(BrokenJson, isPlacedByLineAndColumn)
         {nodeWith("\"reading\":NaN"), "line 1, column 69: "},
     };
     for (const auto& [document, place] : documents)
-        EXPECT_THAT(errorOf([&text = document] { readModel(text); }), StartsWith(place))
+        EXPECT_THAT(errorOf([&text = document] { readMachineFile(text); }), StartsWith(place))
             << document;
 }
 
 TEST(BrokenJson, saysWhatWasExpectedWithoutTheNameOfALibrary)
 {
-    const std::string error = errorOf([] { readModel("{\"nodes\":[],}"); });
+    const std::string error = errorOf([] { readMachineFile("{\"nodes\":[],}"); });
     EXPECT_THAT(error, HasSubstr("expected string literal"));
     EXPECT_THAT(error, testing::Not(HasSubstr("json.exception")));
 }
 
 TEST(BrokenJson, aNumberBeyondADoubleIsRefused)
 {
-    EXPECT_THAT(errorOf([] { readModel(nodeWith("\"reading\":1e999")); }),
+    EXPECT_THAT(errorOf([] { readMachineFile(nodeWith("\"reading\":1e999")); }),
         testing::MatchesRegex("line 1, column 7[0-9]: number overflow parsing '1e999'"));
 }
 
 TEST(BrokenJson, everyTruncationOfAModelIsRefused)
 {
     const std::string document = nodeWith(R"("reading":41.5,"possibleStates":[1,23])");
-    ASSERT_EQ(errorOf([&] { readModel(document); }), "");
+    ASSERT_EQ(errorOf([&] { readMachineFile(document); }), "");
     for (std::size_t length = 0; length < document.size(); ++length)
-        EXPECT_THAT(errorOf([&] { readModel(document.substr(0, length)); }), StartsWith("line 1"))
+        EXPECT_THAT(
+            errorOf([&] { readMachineFile(document.substr(0, length)); }), StartsWith("line 1"))
             << length;
 }
 
 TEST(HostileModel, aHundredMegabytesOfNestingAreRefusedAtOnce)
 {
     const std::string brackets(100'000'000, '[');
-    EXPECT_EQ(
-        errorOf([&] { readModel(brackets); }), "the document: expected an object, found an array");
+    EXPECT_EQ(errorOf([&] { readMachineFile(brackets); }),
+        "line 1, column 6: the values are nested too deeply");
     std::string objects;
     while (objects.size() < 100'000'000)
         objects += "{\"nodes\":";
-    EXPECT_EQ(errorOf([&] { readModel(objects); }), "/nodes: expected an array, found an object");
+    EXPECT_EQ(errorOf([&] { readMachineFile(objects); }),
+        "line 1, column 46: the values are nested too deeply");
 }
 
 TEST(HostileModel, aLongStringIsCutInTheMessage)
 {
     const std::string longName(1'000'000, 'x');
     const auto lengthOf = [](const std::string& document) {
-        return errorOf([&] { readModel(document); }).size();
+        return errorOf([&] { readMachineFile(document); }).size();
     };
     EXPECT_LT(lengthOf(nodeWith("\"" + longName + "\":1")), 400U);
     EXPECT_LT(lengthOf(nodeWith("\"reading\":\"" + longName + "\"")), 400U);
@@ -289,8 +291,8 @@ TEST(HostileModel, aLongStringIsCutInTheMessage)
 
 TEST(HostileModel, controlCharactersAreEscapedInTheMessage)
 {
-    EXPECT_EQ(errorOf([] { readModel(nodeWith(R"("a\nb":1)")); }),
+    EXPECT_EQ(errorOf([] { readMachineFile(nodeWith(R"("a\nb":1)")); }),
         "/nodes/0/a\\nb: there is no such member");
 }
 
-} // namespace ModelReaderTests
+} // namespace MachineFileReaderTests

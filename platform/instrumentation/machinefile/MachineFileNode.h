@@ -1,0 +1,20 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#pragma once
+
+#include "platform/instrumentation/Source.h"
+
+#include <string>
+
+namespace Vorn {
+
+// One sensor of a described machine, as a model file states it.
+struct MachineFileNode {
+    NodeLexicon::NodeType type{};
+    std::string path;
+    std::string description;
+    unsigned sensorType = 0;
+    NodeReading values;
+};
+
+} // namespace Vorn

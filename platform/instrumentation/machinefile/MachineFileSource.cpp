@@ -1,0 +1,35 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "platform/instrumentation/machinefile/MachineFileSource.h"
+
+#include "platform/instrumentation/machinefile/MachineFileCache.h"
+
+namespace Vorn {
+
+MachineFileSource::MachineFileSource(const std::string& path)
+    : nodes_(MachineFileCache::instance().load(path))
+{
+}
+
+std::vector<Node> MachineFileSource::nodes(NodeLexicon::NodeType type)
+{
+    std::vector<Node> found;
+    for (std::size_t index = 0; index < nodes_->size(); ++index) {
+        const MachineFileNode& node = (*nodes_)[index];
+        if (node.type == type)
+            found.push_back({node.path, node.description, node.sensorType, index});
+    }
+    return found;
+}
+
+NodeReading MachineFileSource::read(const Node& node)
+{
+    return nodes_->at(node.token).values;
+}
+
+void checkMachineFile(const std::string& path)
+{
+    MachineFileCache::instance().load(path);
+}
+
+} // namespace Vorn

@@ -1,0 +1,17 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#pragma once
+
+#include "platform/instrumentation/machinefile/MachineFileNode.h"
+
+#include <string>
+#include <vector>
+
+namespace Vorn {
+
+// Returns the text of a model file: one line for each node, in the order given, members always in
+// the same order, numbers in the shortest form that reads back as the same double. A value that a
+// node lacks, or that is not finite, is left out. Bytes that are not UTF-8 become U+FFFD.
+std::string writeMachineFile(const std::vector<MachineFileNode>& nodes);
+
+} // namespace Vorn
