@@ -3,8 +3,8 @@
 #include "platform/instrumentation/Instrumentation.h"
 
 #include "platform/instrumentation/FailureLog.h"
+#include "platform/instrumentation/OpenSource.h"
 #include "platform/instrumentation/Source.h"
-#include "platform/instrumentation/SourceRegistry.h"
 #include "platform/text/Escape.h"
 #include "platform/text/Utf8.h"
 

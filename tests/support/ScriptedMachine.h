@@ -6,8 +6,8 @@
 #pragma once
 
 #include "platform/instrumentation/Source.h"
-#include "platform/instrumentation/SourceRegistry.h"
 #include "tests/support/Environment.h"
+#include "tests/support/TestSources.h"
 
 #include <map>
 #include <memory>
@@ -33,12 +33,11 @@ public:
         : script_(std::make_shared<Script>(Script{std::move(nodes), {}, {}})),
           environment_("VORN_INSTRUMENTATION", "scripted")
     {
-        Vorn::registerSource(
-            "scripted", [script = script_](const std::string&) -> std::unique_ptr<Vorn::Source> {
-                if (script->constructionFails)
-                    throw std::runtime_error("scripted: construction");
-                return std::make_unique<ScriptedSource>(script);
-            });
+        provideSource("scripted", [script = script_]() -> std::unique_ptr<Vorn::Source> {
+            if (script->constructionFails)
+                throw std::runtime_error("scripted: construction");
+            return std::make_unique<ScriptedSource>(script);
+        });
     }
 
     void failConstruction(bool fails = true) { script_->constructionFails = fails; }

@@ -6,8 +6,8 @@
 #pragma once
 
 #include "platform/instrumentation/Source.h"
-#include "platform/instrumentation/SourceRegistry.h"
 #include "tests/support/Environment.h"
+#include "tests/support/TestSources.h"
 
 #include <algorithm>
 #include <functional>
@@ -27,9 +27,8 @@ public:
         : watch_(std::make_shared<Watch>(Watch{std::move(whenRead), 0, 0, 0})),
           environment_("VORN_INSTRUMENTATION", "watched")
     {
-        Vorn::registerSource("watched", [watch = watch_](const std::string&) {
-            return std::make_unique<WatchedSource>(watch);
-        });
+        provideSource(
+            "watched", [watch = watch_] { return std::make_unique<WatchedSource>(watch); });
     }
 
     unsigned cursorsMade() const { return watch_->made; }

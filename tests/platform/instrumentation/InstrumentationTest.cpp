@@ -2,11 +2,11 @@
 
 #include "platform/instrumentation/Instrumentation.h"
 
-#include "platform/instrumentation/SourceRegistry.h"
 #include "tests/platform/instrumentation/Walk.h"
 #include "tests/support/Environment.h"
 #include "tests/support/LogCapture.h"
 #include "tests/support/ScriptedMachine.h"
+#include "tests/support/TestSources.h"
 
 #include <gmock/gmock.h>
 
@@ -17,7 +17,6 @@ namespace InstrumentationTests {
 using testing::ElementsAre;
 using Testing::EnvironmentVariable;
 using Testing::errorOf;
-using testing::HasSubstr;
 using testing::IsEmpty;
 using Testing::LogCapture;
 using Testing::ScriptedMachine;
@@ -47,8 +46,7 @@ private:
 struct CountingMachine {
     CountingMachine()
     {
-        Vorn::registerSource(
-            "counting", [](const std::string&) { return std::make_unique<CountingSource>(); });
+        Testing::provideSource("counting", [] { return std::make_unique<CountingSource>(); });
     }
     EnvironmentVariable environment{"VORN_INSTRUMENTATION", "counting"};
 };
@@ -178,33 +176,6 @@ TEST(Cursor, makesPathsPrintable)
     EXPECT_EQ(cursor.convertPathToString("/a\n\xFF"), "/a\\n\xEF\xBF\xBD");
 }
 
-TEST(Settings, anUnknownKindOfSourceIsNamed)
-{
-    const EnvironmentVariable environment("VORN_INSTRUMENTATION", "hwmon,ipmb:3");
-    EXPECT_THAT(errorOf([] { Instrumentation cursor; }),
-        testing::AllOf(HasSubstr("\"ipmb:3\""), HasSubstr("hwmon, model")));
-}
-
-TEST(Settings, wrongArgumentsAreNamed)
-{
-    const EnvironmentVariable noFile("VORN_INSTRUMENTATION", "model");
-    EXPECT_THAT(errorOf([] { Instrumentation cursor; }), HasSubstr("\"model\" names no file"));
-    const EnvironmentVariable argument("VORN_INSTRUMENTATION", "hwmon:x");
-    EXPECT_THAT(errorOf([] { Instrumentation cursor; }), HasSubstr("\"hwmon:x\""));
-}
-
-TEST(Settings, anEmptyEntryIsAnError)
-{
-    const EnvironmentVariable environment("VORN_INSTRUMENTATION", "hwmon,");
-    EXPECT_THAT(errorOf([] { Instrumentation cursor; }), HasSubstr("\"hwmon,\""));
-}
-
-TEST(Settings, anEmptyListMeansTheDefault)
-{
-    const EnvironmentVariable environment("VORN_INSTRUMENTATION", "");
-    EXPECT_NO_THROW(Instrumentation());
-}
-
 TEST(Settings, areReadAtEveryConstruction)
 {
     const ScriptedMachine machine({{NodeType::Voltage, "/v", "V", {}}});
@@ -213,24 +184,14 @@ TEST(Settings, areReadAtEveryConstruction)
     EXPECT_THAT(walk(), SizeIs(6));
 }
 
-TEST(Registry, replacesAKindOfSource)
-{
-    const ScriptedMachine first({{NodeType::Voltage, "/1", "1", {}}});
-    const ScriptedMachine second({{NodeType::Voltage, "/2", "2", {}}});
-    EXPECT_EQ(walk().at(0).path, "/2");
-}
-
-TEST(Registry, isSafeToUseFromManyThreads)
+TEST(Cursor, isUsedOnManyThreadsAtOnce)
 {
     const CountingMachine machine;
     std::vector<std::jthread> threads;
     for (int thread = 0; thread < 8; ++thread)
-        threads.emplace_back([thread] {
-            for (int turn = 0; turn < 50; ++turn) {
-                Vorn::registerSource("many" + std::to_string(thread),
-                    [](const std::string&) { return std::make_unique<CountingSource>(); });
+        threads.emplace_back([] {
+            for (int turn = 0; turn < 50; ++turn)
                 EXPECT_THAT(walk(), SizeIs(6));
-            }
         });
 }
 
@@ -319,9 +280,8 @@ TEST_F(Failure, withAnotherReasonIsReported)
     const LogCapture capture;
     const EnvironmentVariable environment("VORN_INSTRUMENTATION", "reasons");
     std::string reason = "first";
-    Vorn::registerSource("reasons", [&](const std::string&) -> std::unique_ptr<Vorn::Source> {
-        throw std::runtime_error(reason);
-    });
+    Testing::provideSource(
+        "reasons", [&]() -> std::unique_ptr<Vorn::Source> { throw std::runtime_error(reason); });
     request();
     reason = "second";
     request();

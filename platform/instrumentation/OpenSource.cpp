@@ -1,0 +1,29 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "platform/instrumentation/OpenSource.h"
+
+#include "platform/instrumentation/hwmon/HwmonSource.h"
+#include "platform/instrumentation/machinefile/MachineFileSource.h"
+
+#include <stdexcept>
+
+namespace Vorn {
+
+std::unique_ptr<Source> openSource(const SourceEntry& entry)
+{
+    if (entry.scheme == "hwmon") {
+        if (!entry.argument.empty())
+            throw std::runtime_error(
+                "source \"hwmon:" + entry.argument + "\": hwmon takes no argument");
+        return std::make_unique<HwmonSource>();
+    }
+    if (entry.scheme == "model") {
+        if (entry.argument.empty())
+            throw std::runtime_error("source \"model\" names no file: write model:FILE");
+        return std::make_unique<MachineFileSource>(entry.argument);
+    }
+    throw std::runtime_error(
+        "source \"" + entry.text + "\" is of an unknown kind (there are: hwmon, model)");
+}
+
+} // namespace Vorn
