@@ -10,7 +10,7 @@ set(CMAKE_EXPORT_COMPILE_COMMANDS ON)
 set(CMAKE_LIBRARY_OUTPUT_DIRECTORY "${CMAKE_BINARY_DIR}/lib")
 set(CMAKE_RUNTIME_OUTPUT_DIRECTORY "${CMAKE_BINARY_DIR}/bin")
 
-add_compile_options(-Wall -Wextra -Wpedantic -Wconversion -Wshadow -Werror)
+add_compile_options(-Wall -Wextra -Wpedantic -Wconversion -Wshadow)
 add_compile_options(-fstack-protector-strong)
 add_link_options(-Wl,-z,relro,-z,now)
 
