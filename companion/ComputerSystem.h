@@ -1,7 +1,5 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// This computer, as far as its CIM instance tells about it.
-
 #pragma once
 
 #include <optional>
@@ -9,12 +7,13 @@
 
 namespace Vorn::Companion {
 
+// This computer, as its CIM instance describes it.
 struct ComputerSystem {
     std::string name;                     // SystemName of all that belongs to the computer
     std::optional<std::string> machineId; // hashed: the machine's own is not for publication
 };
 
-// Reads it afresh: a renamed machine has its new name at the next request.
+// Returns the computer as it is now: a renamed one has its new name at the next request.
 ComputerSystem thisComputerSystem();
 
 } // namespace Vorn::Companion

@@ -9,7 +9,7 @@ build_packages=(
   libcli11-dev libexpat1-dev libfmt-dev libsensors-dev libspdlog-dev libutfcpp-dev
   nlohmann-json3-dev tao-pegtl-dev
   libcrypt-dev libgnutls28-dev libmicrohttpd-dev libsystemd-dev
-  nettle-dev pkg-config
+  pkg-config
 )
 
 check_packages=(

@@ -2,8 +2,8 @@
 
 #include "platform/logging/Sinks.h"
 
-#include "platform/logging/LineFormat.h"
 #include "platform/logging/PipeSignal.h"
+#include "platform/text/Escape.h"
 
 #include <spdlog/pattern_formatter.h>
 #include <spdlog/sinks/base_sink.h>

@@ -2,9 +2,14 @@
 
 #include "companion/ComputerSystemObjects.h"
 
+#include "platform/text/Trim.h"
 #include "tests/support/ProviderTest.h"
 
 #include <gmock/gmock.h>
+
+#include <array>
+#include <cstdio>
+#include <memory>
 
 namespace ComputerSystemObjectsTests {
 
@@ -71,6 +76,24 @@ TEST_F(ComputerSystemObjectsTest, thePathHasTheRequestsNamespaceAndTheComputerAs
 TEST_F(ComputerSystemObjectsTest, theComputerHasTheSystemNameOfItsSensors)
 {
     EXPECT_EQ(Vorn::Companion::thisComputerSystem().name, systemName_);
+}
+
+// Returns the first line that a command prints; empty when it prints none.
+std::string firstLineOf(const char* command)
+{
+    const std::unique_ptr<FILE, int (*)(FILE*)> pipe(::popen(command, "r"), ::pclose);
+    std::array<char, 128> line{};
+    if (pipe == nullptr || std::fgets(line.data(), line.size(), pipe.get()) == nullptr)
+        return {};
+    return std::string(Text::trimmed(line.data()));
+}
+
+TEST_F(ComputerSystemObjectsTest, TheMachineIdIsTheOneThatTheSystemDerivesForThisProvider)
+{
+    ASSERT_NE(firstLineOf("systemd-id128 new"), "") << "is the package systemd installed?";
+    EXPECT_EQ(Vorn::Companion::thisComputerSystem().machineId.value_or(""),
+        firstLineOf("systemd-id128 machine-id --uuid "
+                    "--app-specific=b3dfdcbb7a2845c0b6176da21f2a762d 2>/dev/null"));
 }
 
 } // namespace ComputerSystemObjectsTests

@@ -102,7 +102,7 @@ TEST(InstalledLibrary, needsNothingOfTheServer)
         "libc", "libgcc_s", "libstdc++", "libm", "ld-linux-x86-64", "ld-linux-aarch64"};
     std::set<std::string> forSensors = {"libsensors", "libfmt"};
     forSensors.insert(common.begin(), common.end());
-    std::set<std::string> forSystems = {"libnettle"};
+    std::set<std::string> forSystems = {"libsystemd"};
     forSystems.insert(common.begin(), common.end());
     EXPECT_THAT(neededLibraries(sensorLibrary), IsSubsetOf(forSensors));
     EXPECT_THAT(neededLibraries(sensorLibrary), Contains("libsensors"));
