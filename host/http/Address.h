@@ -2,40 +2,42 @@
 
 #pragma once
 
+#include <netinet/in.h>
 #include <sys/socket.h>
 
 #include <cstdint>
 #include <string>
+#include <variant>
 
 namespace Host::Http {
 
 // An IPv4 or IPv6 address with a port.
 class Address {
 public:
-    // Throws std::invalid_argument for what is neither, such as the name of a host.
+    // Throws std::invalid_argument for a host that is neither, such as a name.
     Address(const std::string& host, std::uint16_t port);
-    // Anything else becomes 0.0.0.0.
+    // Copies an address of either family; any other becomes 0.0.0.0.
     explicit Address(const ::sockaddr* raw);
 
-    // Whether only this machine itself can reach it.
-    bool isLoopback() const;
-    bool isAny() const; // 0.0.0.0 or ::
-    bool isIpv6() const { return storage_.ss_family == AF_INET6; }
+    bool isLoopback() const; // 127.0.0.0/8 or ::1
+    bool isAny() const;      // 0.0.0.0 or ::
+    bool isIpv6() const { return std::holds_alternative<::sockaddr_in6>(address_); }
     std::uint16_t port() const;
     void setPort(std::uint16_t port);
 
-    // Such as 127.0.0.1 or ::1.
+    // Returns a text such as 127.0.0.1 or ::1.
     std::string host() const;
-    // Such as 127.0.0.1:5988 or [::1]:5988.
+    // Returns a text such as 127.0.0.1:5988 or [::1]:5988.
     std::string text() const;
-    // The host, or the network of 64 bits that an IPv6 one can choose its addresses from.
+    // Returns the host of an IPv4 address. Returns the network of 64 bits of an IPv6 address, since
+    // its host can use any address in it.
     std::string neighbourhood() const;
 
-    const ::sockaddr* raw() const { return reinterpret_cast<const ::sockaddr*>(&storage_); }
+    const ::sockaddr* raw() const;
     ::socklen_t size() const;
 
 private:
-    ::sockaddr_storage storage_{};
+    std::variant<::sockaddr_in, ::sockaddr_in6> address_;
 };
 
 } // namespace Host::Http

@@ -54,6 +54,7 @@ Daemon::Daemon(Service& service, ListeningSocket socket)
 Daemon::~Daemon()
 {
     stopAccepting();
+    service_.connections.beginShutdown(); // or a thread would sleep until its sign-in is refused
 }
 
 void Daemon::start(const Certificate* certificate)

@@ -20,8 +20,8 @@ public:
     // Throws std::runtime_error when the library fails. The service must outlive it, and have a
     // certificate where the socket is encrypted.
     Daemon(Service& service, ListeningSocket socket);
-    // Closes all connections and joins their threads. REQUIRES: the shutdown of the service's
-    // connections has begun.
+    // Begins the shutdown of the service's connections, closes those of this daemon and joins their
+    // threads.
     ~Daemon();
     Daemon(const Daemon&) = delete;
     Daemon& operator=(const Daemon&) = delete;

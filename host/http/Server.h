@@ -8,13 +8,16 @@
 #include "host/http/ListeningSocket.h"
 
 #include <chrono>
+#include <list>
 #include <memory>
 #include <vector>
 
 namespace Host::Http {
 
 class Certificate;
+class Daemon;
 class Passwords;
+struct Service;
 
 // Serves clients on threads of its own until it is destroyed. Installs no signal handlers; writes
 // failures with single clients to the log. Thread-safe.
@@ -45,9 +48,8 @@ public:
     bool waitUntilIdle(std::chrono::milliseconds timeout);
 
 private:
-    struct Parts;
-
-    std::unique_ptr<Parts> parts_;
+    std::unique_ptr<Service> service_;
+    std::list<Daemon> daemons_; // last: they use the service until they are destroyed
 };
 
 } // namespace Host::Http

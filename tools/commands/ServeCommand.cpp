@@ -1,7 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
 #include "host/http/EventLog.h"
-#include "host/http/Privileges.h"
 #include "host/http/Server.h"
 #include "host/manager/SensorProfile.h"
 #include "host/operations/ObjectManager.h"
@@ -15,6 +14,7 @@
 #include "tools/output/Output.h"
 #include "tools/serve/Greeting.h"
 #include "tools/serve/MemoryReturn.h"
+#include "tools/serve/Privileges.h"
 #include "tools/serve/Protection.h"
 #include "tools/serve/ServeOptions.h"
 #include "tools/serve/ServiceManager.h"
@@ -69,19 +69,6 @@ std::vector<Host::Http::Endpoint> endpointsFor(const ServeOptions& options)
     } catch (const std::invalid_argument& error) {
         throw UsageError(error.what());
     }
-}
-
-// Who serves, for the log.
-std::string renounceRoot(const std::optional<std::string>& wanted)
-{
-    if (!Host::Http::isRoot()) {
-        if (wanted && !Host::Http::isUser(*wanted))
-            throw std::runtime_error("only root can run the server as another user, " + *wanted);
-        return "serving as user " + std::to_string(::geteuid());
-    }
-    const std::string user = wanted ? *wanted : Host::Http::unprivilegedUser();
-    Host::Http::becomeUser(user);
-    return Host::Http::isRoot() ? "serving as root, as --user says" : "serving as " + user;
 }
 
 void requireReadable(const std::string& file)
@@ -139,11 +126,11 @@ bool serve(Host::Http::Server& server, const Protection& protection, const Signa
     std::chrono::seconds gracePeriod)
 {
     while (signals.wait() == SIGHUP) {
-        tellServiceManager(ServiceState::reloading);
+        notifyServiceManager("RELOADING=1");
         protection.renew(server);
-        tellServiceManager(ServiceState::ready);
+        notifyServiceManager("READY=1");
     }
-    tellServiceManager(ServiceState::stopping);
+    notifyServiceManager("STOPPING=1");
     report({"serve", "ServeCommand", __LINE__}, "ending");
     server.beginShutdown();
     constexpr std::chrono::milliseconds interval{20};
@@ -195,7 +182,7 @@ public:
             protection.certificate(), protection.passwords());
         out.write(text);
         out.flush();
-        tellServiceManager(ServiceState::ready);
+        notifyServiceManager("READY=1");
         if (serve(server, protection, signals, options_.gracePeriod))
             return ExitCode::success;
         complain("requests were still running at the end of the grace period");

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-#include "host/http/Privileges.h"
+#include "tools/serve/Privileges.h"
 
 #include <grp.h>
 #include <pwd.h>
@@ -8,12 +8,11 @@
 #include <unistd.h>
 
 #include <cerrno>
-#include <optional>
 #include <stdexcept>
 #include <system_error>
 #include <vector>
 
-namespace Host::Http {
+namespace Tools {
 
 namespace {
 
@@ -42,40 +41,7 @@ void require(bool isDone, const std::string& what)
         throw std::runtime_error(what + ": " + std::system_category().message(errno));
 }
 
-bool hasBecome(const User& user)
-{
-    ::uid_t ids[3] = {};
-    ::gid_t groups[3] = {};
-    if (::getresuid(&ids[0], &ids[1], &ids[2]) != 0 ||
-        ::getresgid(&groups[0], &groups[1], &groups[2]) != 0)
-        return false;
-    for (const ::uid_t id : ids)
-        if (id != user.id)
-            return false;
-    for (const ::gid_t group : groups)
-        if (group != user.group)
-            return false;
-    return user.id == 0 || ::setuid(0) != 0;
-}
-
-} // namespace
-
-std::string unprivilegedUser()
-{
-    return findUser("sensor-profile") ? "sensor-profile" : "nobody";
-}
-
-bool isRoot()
-{
-    return ::geteuid() == 0;
-}
-
-bool isUser(const std::string& name)
-{
-    const auto user = findUser(name);
-    return user && user->id == ::geteuid();
-}
-
+// REQUIRES: the process is root's.
 void becomeUser(const std::string& name)
 {
     const auto user = findUser(name);
@@ -87,8 +53,25 @@ void becomeUser(const std::string& name)
     require(::setresuid(user->id, user->id, user->id) == 0, "cannot become " + name);
     require(::prctl(PR_SET_NO_NEW_PRIVS, 1UL, 0UL, 0UL, 0UL) == 0,
         "cannot renounce further privileges");
-    if (!hasBecome(*user))
+    if (user->id != 0 && ::setuid(0) == 0)
         throw std::runtime_error("became " + name + ", but kept rights of before");
 }
 
-} // namespace Host::Http
+} // namespace
+
+std::string renounceRoot(const std::optional<std::string>& wanted)
+{
+    if (::geteuid() != 0) {
+        const auto user = wanted ? findUser(*wanted) : std::nullopt;
+        if (wanted && (!user || user->id != ::geteuid()))
+            throw std::runtime_error("only root can run the server as another user, " + *wanted);
+        return "serving as user " + std::to_string(::geteuid());
+    }
+    const std::string user = wanted                       ? *wanted
+                             : findUser("sensor-profile") ? "sensor-profile"
+                                                          : "nobody";
+    becomeUser(user);
+    return ::geteuid() == 0 ? "serving as root, as --user says" : "serving as " + user;
+}
+
+} // namespace Tools
