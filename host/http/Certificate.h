@@ -1,7 +1,5 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// What the server shows of itself to clients that use TLS.
-
 #pragma once
 
 #include <memory>
@@ -11,12 +9,12 @@ struct gnutls_certificate_credentials_st;
 
 namespace Host::Http {
 
-// A certificate with those that lead to its authority, and its private key. Immutable.
+// A server's certificate chain and private key for TLS. Immutable.
 class Certificate {
 public:
-    // Both files in PEM form, the key without a password. Throws std::runtime_error naming the
-    // file and the reason when one cannot be used or both do not belong together; the key's is a
-    // secret (see SecretFile.h). One whose time is over is told to the log.
+    // Reads both files, in PEM form, the key without a password and by readSecretFile. Throws
+    // std::runtime_error with the file and the reason when one cannot be used or both do not belong
+    // together. An expired certificate is reported to the log.
     static std::shared_ptr<const Certificate> read(
         const std::string& certificateFile, const std::string& keyFile);
 
@@ -24,7 +22,7 @@ public:
 
     const std::string& certificateText() const { return certificateText_; }
     const std::string& keyText() const { return keyText_; }
-    // Belongs to this object.
+    // Returns a handle that this object owns.
     ::gnutls_certificate_credentials_st* handle() const { return credentials_.get(); }
 
 private:

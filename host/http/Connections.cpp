@@ -62,23 +62,18 @@ bool Connections::hasRoomFor(const Address& client, const std::string& neighbour
 {
     const auto found = countByNeighbourhood_.find(neighbourhood);
     const bool areTooMany = all_.size() >= limits_.maximumConnections;
-    const bool areTooManyThere = found != countByNeighbourhood_.end() &&
-                                 found->second >= limits_.maximumConnectionsPerAddress;
-    if (areTooMany || areTooManyThere)
-        complain(client, areTooMany);
-    return !areTooMany && !areTooManyThere;
-}
-
-void Connections::complain(const Address& client, bool areTooMany)
-{
+    if (!areTooMany && (found == countByNeighbourhood_.end() ||
+                           found->second < limits_.maximumConnectionsPerAddress))
+        return true;
     const auto now = Clock::now();
-    if (lastComplaint_ != Clock::time_point{} && now - lastComplaint_ < complaintInterval)
-        return;
-    lastComplaint_ = now;
-    report({"complain", "Connections", __LINE__},
-        "refused a connection from " + client.host() + ": there are " +
-            std::to_string(all_.size()) +
-            (areTooMany ? "" : ", too many of them from this address"));
+    if (!lastComplaint_ || now - *lastComplaint_ >= complaintInterval) {
+        lastComplaint_ = now;
+        report({"hasRoomFor", "Connections", __LINE__},
+            "refused a connection from " + client.host() + ": there are " +
+                std::to_string(all_.size()) +
+                (areTooMany ? "" : ", too many of them from this address"));
+    }
+    return false;
 }
 
 void Connections::remove(ClientConnection& connection)

@@ -89,7 +89,6 @@ private:
     void closeOverdue();
     std::chrono::seconds timeoutOf(Phase phase) const;
     bool hasRoomFor(const Address& client, const std::string& neighbourhood);
-    void complain(const Address& client, bool areTooMany);
 
     const Limits& limits_;
     mutable std::mutex mutex_;
@@ -99,7 +98,7 @@ private:
     std::map<std::string, std::size_t> countByNeighbourhood_;
     std::size_t busy_ = 0; // connections that are not idle
     bool isShuttingDown_ = false;
-    Clock::time_point lastComplaint_{};
+    std::optional<Clock::time_point> lastComplaint_;
     std::jthread watcher_; // last: it uses all of the above
 };
 

@@ -2,15 +2,24 @@
 
 #include "host/http/Daemon.h"
 
-#include "host/http/Callbacks.h"
+#include "host/http/EventLog.h"
 #include "host/http/Service.h"
 
+#include <gnutls/gnutls.h>
 #include <microhttpd.h>
+#include <sys/socket.h>
 
+#include <algorithm>
+#include <array>
+#include <cstdarg>
 #include <cstddef>
 #include <cstdint>
+#include <cstdio>
+#include <memory>
+#include <new>
 #include <stdexcept>
 #include <string>
+#include <string_view>
 #include <utility>
 #include <vector>
 
@@ -20,11 +29,168 @@ namespace {
 
 constexpr const char* tlsVersions = "NORMAL:-VERS-ALL:+VERS-TLS1.3:+VERS-TLS1.2:%SERVER_PRECEDENCE";
 
-// For a head, beside which the beginning of the body or a piece of the answer must find place.
+// In addition to the head, a connection's memory holds the beginning of the body or a part of the
+// answer.
 constexpr std::size_t memoryBesideHead = std::size_t{48} << 10;
 
 // Providers run on the threads of the connections.
 constexpr std::size_t stackSize = std::size_t{512} << 10;
+
+// Of a query, which no request needs. libmicrohttpd keeps the arguments in the memory for the head,
+// and neither answers nor closes the connection when that is used up.
+constexpr std::ptrdiff_t maximumArguments = 100;
+
+// The closure of each callback is the Service. No exception leaves a callback.
+Service& serviceOf(void* closure)
+{
+    return *static_cast<Service*>(closure);
+}
+
+// Returns null for a connection that exceeded a limit, or for which there was no memory.
+ClientConnection* clientOf(MHD_Connection* connection)
+{
+    const auto* const info =
+        ::MHD_get_connection_info(connection, MHD_CONNECTION_INFO_SOCKET_CONTEXT);
+    return info == nullptr ? nullptr : static_cast<ClientConnection*>(info->socket_context);
+}
+
+// Returns null without TLS. A connection keeps the certificate that it began with.
+std::shared_ptr<const Certificate> showCertificate(Service& service, MHD_Connection* connection)
+{
+    const auto* const info =
+        ::MHD_get_connection_info(connection, MHD_CONNECTION_INFO_GNUTLS_SESSION);
+    if (info == nullptr || info->tls_session == nullptr)
+        return nullptr;
+    auto certificate = service.certificate.get();
+    ::gnutls_credentials_set(static_cast<gnutls_session_t>(info->tls_session),
+        GNUTLS_CRD_CERTIFICATE, certificate->handle());
+    return certificate;
+}
+
+ClientConnection* connected(Service& service, MHD_Connection* connection)
+{
+    const auto* const descriptor =
+        ::MHD_get_connection_info(connection, MHD_CONNECTION_INFO_CONNECTION_FD);
+    const auto* const address =
+        ::MHD_get_connection_info(connection, MHD_CONNECTION_INFO_CLIENT_ADDRESS);
+    return service.connections.add(descriptor->connect_fd, Address(address->client_addr),
+        showCertificate(service, connection));
+}
+
+MHD_Result addField(void* head, MHD_ValueKind, const char* name, std::size_t nameSize,
+    const char* value, std::size_t valueSize)
+{
+    try {
+        static_cast<RequestHead*>(head)->fields.push_back({std::string(name, nameSize),
+            value == nullptr ? std::string() : std::string(value, valueSize)});
+        return MHD_YES;
+    } catch (...) {
+        return MHD_NO;
+    }
+}
+
+RequestHead headOf(
+    MHD_Connection* connection, const std::string& target, const char* method, const char* version)
+{
+    RequestHead head{method, target, version, {}};
+    const int count = ::MHD_get_connection_values_n(connection, MHD_HEADER_KIND, nullptr, nullptr);
+    head.fields.reserve(static_cast<std::size_t>(count));
+    if (::MHD_get_connection_values_n(connection, MHD_HEADER_KIND, &addField, &head) != count)
+        throw std::bad_alloc();
+    return head;
+}
+
+std::size_t headSizeOf(MHD_Connection* connection)
+{
+    const auto* const info =
+        ::MHD_get_connection_info(connection, MHD_CONNECTION_INFO_REQUEST_HEADER_SIZE);
+    return info == nullptr ? 0 : info->header_size;
+}
+
+void connectionChanged(void* service, MHD_Connection* connection, void** client,
+    MHD_ConnectionNotificationCode what) noexcept
+{
+    if (what == MHD_CONNECTION_NOTIFY_STARTED) {
+        try {
+            *client = connected(serviceOf(service), connection);
+        } catch (...) {
+            *client = nullptr; // its requests are not answered
+        }
+    } else if (*client != nullptr) {
+        auto& ended = *static_cast<ClientConnection*>(*client);
+        ended.exchange.reset();
+        serviceOf(service).connections.remove(ended);
+        *client = nullptr;
+    }
+}
+
+void* requestBegins(void* service, const char* uri, MHD_Connection* connection) noexcept
+{
+    ClientConnection* const client = clientOf(connection);
+    if (client == nullptr)
+        return nullptr;
+    serviceOf(service).connections.enter(*client, Phase::receiving);
+    client->target.clear();
+    try {
+        const std::string_view target = uri == nullptr ? "" : uri;
+        if (std::count(target.begin(), target.end(), '&') < maximumArguments) {
+            client->target = target;
+            return nullptr;
+        }
+        mention({"requestBegins", "Daemon", __LINE__},
+            "a request from " + client->address + " has too many arguments");
+    } catch (...) {
+        report({"requestBegins", "Daemon", __LINE__}, "no memory for a request");
+    }
+    ::shutdown(client->descriptor, SHUT_RDWR);
+    return nullptr;
+}
+
+MHD_Result requestGoesOn(void* service, MHD_Connection* connection, const char*, const char* method,
+    const char* version, const char* piece, std::size_t* size, void**) noexcept
+{
+    ClientConnection* const client = clientOf(connection);
+    if (client == nullptr)
+        return MHD_NO;
+    try {
+        if (!client->exchange) {
+            client->exchange.emplace(serviceOf(service), *client, *connection);
+            const bool isWell = client->exchange->begin(
+                headOf(connection, client->target, method, version), headSizeOf(connection));
+            return isWell ? MHD_YES : MHD_NO;
+        }
+        const std::string_view bytes(piece, *size);
+        *size = 0;
+        return client->exchange->proceed(bytes) ? MHD_YES : MHD_NO;
+    } catch (...) {
+        report({"requestGoesOn", "Daemon", __LINE__}, "no memory for a request");
+        return MHD_NO;
+    }
+}
+
+void requestEnded(
+    void* service, MHD_Connection* connection, void**, MHD_RequestTerminationCode) noexcept
+{
+    ClientConnection* const client = clientOf(connection);
+    if (client == nullptr)
+        return;
+    client->exchange.reset();
+    serviceOf(service).connections.enter(*client, Phase::idle);
+}
+
+void logLine(void*, const char* format, std::va_list arguments) noexcept
+{
+    std::array<char, 512> text{};
+    std::vsnprintf(text.data(), text.size(), format, arguments);
+    std::string_view line = text.data();
+    while (line.ends_with('\n'))
+        line.remove_suffix(1);
+    try {
+        mention({"logLine", "Daemon", __LINE__}, std::string(line));
+    } catch (...) {
+        return; // the line is lost
+    }
+}
 
 unsigned flagsFor(const ListeningSocket& socket)
 {
@@ -47,7 +213,7 @@ void Daemon::Stopping::operator()(MHD_Daemon* daemon) const
 Daemon::Daemon(Service& service, ListeningSocket socket)
     : service_(service), socket_(std::move(socket))
 {
-    const auto certificate = isEncrypted() ? service_.certificate.get() : nullptr;
+    const auto certificate = socket_.isEncrypted() ? service_.certificate.get() : nullptr;
     start(certificate.get());
 }
 
@@ -63,7 +229,7 @@ void Daemon::start(const Certificate* certificate)
     const Limits& limits = service_.limits;
     std::vector<MHD_OptionItem> options{
         // First, since it is used from then on.
-        {MHD_OPTION_EXTERNAL_LOGGER, reinterpret_cast<std::intptr_t>(&Callbacks::logLine), this},
+        {MHD_OPTION_EXTERNAL_LOGGER, reinterpret_cast<std::intptr_t>(&logLine), nullptr},
         {MHD_OPTION_LISTEN_SOCKET, socket_.descriptor(), nullptr},
         {MHD_OPTION_CONNECTION_MEMORY_LIMIT, number(limits.maximumHeader + memoryBesideHead),
             nullptr},
@@ -72,12 +238,10 @@ void Daemon::start(const Certificate* certificate)
         {MHD_OPTION_THREAD_STACK_SIZE, number(stackSize), nullptr},
         {MHD_OPTION_CONNECTION_TIMEOUT, static_cast<std::intptr_t>(limits.idleTimeout.count()),
             nullptr},
-        {MHD_OPTION_NOTIFY_CONNECTION,
-            reinterpret_cast<std::intptr_t>(&Callbacks::connectionChanged), this},
-        {MHD_OPTION_URI_LOG_CALLBACK, reinterpret_cast<std::intptr_t>(&Callbacks::requestBegins),
-            this},
-        {MHD_OPTION_NOTIFY_COMPLETED, reinterpret_cast<std::intptr_t>(&Callbacks::requestEnded),
-            this},
+        {MHD_OPTION_NOTIFY_CONNECTION, reinterpret_cast<std::intptr_t>(&connectionChanged),
+            &service_},
+        {MHD_OPTION_URI_LOG_CALLBACK, reinterpret_cast<std::intptr_t>(&requestBegins), &service_},
+        {MHD_OPTION_NOTIFY_COMPLETED, reinterpret_cast<std::intptr_t>(&requestEnded), &service_},
     };
     if (certificate != nullptr) {
         options.push_back({MHD_OPTION_HTTPS_MEM_CERT, 0,
@@ -87,8 +251,8 @@ void Daemon::start(const Certificate* certificate)
         options.push_back({MHD_OPTION_HTTPS_PRIORITIES, 0, const_cast<char*>(tlsVersions)});
     }
     options.push_back({MHD_OPTION_END, 0, nullptr});
-    daemon_.reset(::MHD_start_daemon(flagsFor(socket_), 0, nullptr, nullptr,
-        &Callbacks::requestGoesOn, this, MHD_OPTION_ARRAY, options.data(), MHD_OPTION_END));
+    daemon_.reset(::MHD_start_daemon(flagsFor(socket_), 0, nullptr, nullptr, &requestGoesOn,
+        &service_, MHD_OPTION_ARRAY, options.data(), MHD_OPTION_END));
     if (!daemon_)
         throw std::runtime_error("cannot serve " + socket_.address().text() +
                                  ": the HTTP library did not start, the log may tell why");

@@ -29,10 +29,6 @@ public:
     // From now on no client can connect; connections that are open stay. Idempotent.
     void stopAccepting();
 
-    // For the callbacks of the library.
-    bool isEncrypted() const { return socket_.isEncrypted(); }
-    Service& service() const { return service_; }
-
 private:
     struct Stopping {
         void operator()(MHD_Daemon* daemon) const;

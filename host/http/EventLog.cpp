@@ -22,7 +22,8 @@ struct Range {
     char32_t last;
 };
 
-// The log itself escapes those of ASCII.
+// Characters that are invisible or change how others are displayed. The log itself escapes the
+// control characters of ASCII.
 constexpr std::array<Range, 9> unseen{{
     {0x80, 0x9F},       // control characters
     {0xAD, 0xAD},       // the hyphen that is shown at the end of a line
@@ -70,8 +71,7 @@ void writeLine(const Place& place, int level, const std::string& text) noexcept
         RynLog::RynLogger::logLevelMessage(
             place.function, place.file, place.line, "Http", level, nullptr, 0, 0, legible(text));
     } catch (...) {
-        // No memory for its texts: the line is lost.
-        return;
+        return; // without memory the line is lost
     }
 }
 

@@ -1,7 +1,8 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// What the server says to the log. Parts of it are what clients say: bytes that are no UTF-8 and
-// characters that change how others are shown appear as their numbers, such as <0xE9> and <U+202E>.
+// Writes the server's messages to the log. Since parts of them come from clients, bytes that are no
+// UTF-8 and characters that change how others are displayed appear as numbers, such as <0xE9> and
+// <U+202E>. Thread-safe.
 
 #pragma once
 
@@ -15,16 +16,15 @@ struct Place {
     unsigned line;
 };
 
-// For the administrator. Any thread.
+// Writes a message for the administrator.
 void report(const Place& place, const std::string& text) noexcept;
 
-// For those who look for the reason of trouble with one client, or for what clients do; as a rule
-// not written.
+// Writes a detail about a single client or request. By default the log does not keep them.
 void mention(const Place& place, const std::string& text) noexcept;
-// Whether a text for that need be composed.
+// Returns whether the log keeps details.
 bool isMentionWanted() noexcept;
 
-// Why the log does not take what is said, in words; empty when it took the last line.
+// Returns why the log could not write the last line; empty when it could.
 std::string logProblem() noexcept;
 
 } // namespace Host::Http

@@ -155,6 +155,7 @@ bool Exchange::execute()
         report({"execute", "Exchange", __LINE__}, std::string("a request failed: ") + error.what());
         error_ = HttpError(MHD_HTTP_INTERNAL_SERVER_ERROR, "the request failed; the log tells why");
     }
+    answer_.drop();
     return sendError();
 }
 
@@ -184,7 +185,7 @@ void Exchange::enter(Phase phase)
 
 bool Exchange::sendAnswer()
 {
-    // The exchange outlives it.
+    // The library reads the text or the answer until the request ends, and this exchange with it.
     Response response =
         answer_.isWhole() ? Response::whole(answer_.text()) : Response::inPieces(answer_);
     for (const HeaderField& field : answerFieldsFor(head_))
@@ -217,8 +218,8 @@ bool Exchange::send(Response& response, unsigned status)
     return response.queue(connection_, status);
 }
 
-// Whom the answer goes to, and what it is about. The name is one that the client was let in with,
-// but for errors that say otherwise.
+// Returns the status, the client and the call, for the log. The name is the client's claim where
+// the error is a refused sign-in.
 std::string Exchange::summary(unsigned status) const
 {
     std::string text = std::to_string(status) + " to " + client_.address;

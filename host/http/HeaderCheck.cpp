@@ -57,32 +57,11 @@ void checkHost(const RequestHead& head)
         throw HttpError::closing(MHD_HTTP_BAD_REQUEST, "the header field Host is missing");
 }
 
-// Returns the value of two hexadecimal digits.
-std::optional<char> octet(std::string_view digits)
+// Decodes percent signs (RFC 3986, 2.1); one that is not followed by two digits stays.
+std::string decoded(std::string_view text)
 {
-    unsigned value = 0;
-    const char* const end = digits.data() + digits.size();
-    const auto [stop, error] = std::from_chars(digits.data(), end, value, 16);
-    if (digits.size() != 2 || error != std::errc{} || stop != end)
-        return std::nullopt;
-    return static_cast<char>(value);
-}
-
-// Decodes percent signs (RFC 3986, 2.1). Returns nothing where one is not followed by two digits.
-std::optional<std::string> decoded(std::string_view text)
-{
-    std::string result;
-    for (std::size_t i = 0; i < text.size(); ++i) {
-        if (text[i] != '%') {
-            result += text[i];
-            continue;
-        }
-        const auto encoded = octet(text.substr(i + 1, 2));
-        if (!encoded)
-            return std::nullopt;
-        result += *encoded;
-        i += 2;
-    }
+    std::string result(text);
+    result.resize(::MHD_http_unescape(result.data()));
     return result;
 }
 
@@ -172,13 +151,7 @@ void checkOperation(const RequestHead& head, const std::string& prefix)
 std::optional<std::string> findDecoded(const RequestHead& head, const std::string& name)
 {
     const auto value = head.find(name);
-    if (!value)
-        return std::nullopt;
-    auto text = decoded(*value);
-    if (!text)
-        throw HttpError(MHD_HTTP_BAD_REQUEST,
-            "the header field " + name + " holds a percent sign without two digits", mismatch);
-    return text;
+    return value ? std::optional(decoded(*value)) : std::nullopt;
 }
 
 // Returns the namespace of an object path with or without host, class and keys.

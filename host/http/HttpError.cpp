@@ -38,7 +38,7 @@ HttpError::HttpError(unsigned status, const std::string& reason, std::string_vie
 HttpError::HttpError(const CimXml::RequestError& error)
     : HttpError(statusOf(error.outcome()), error.what(), nameOf(error.outcome()))
 {
-    // The body may have ended elsewhere.
+    // The body may have another end than its length says (RFC 9112, 11.2).
     endsConnection_ = error.outcome() == Outcome::requestNotWellFormed;
 }
 

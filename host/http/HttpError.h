@@ -33,7 +33,8 @@ public:
     // Returns whether the connection is closed after the answer.
     bool endsConnection() const noexcept { return endsConnection_; }
 
-    // One that ends the connection: where the request ends is in doubt, or the client shall go.
+    // Creates one that closes the connection: the end of the request is in doubt, or the connection
+    // should make room.
     static HttpError closing(
         unsigned status, const std::string& reason, std::vector<HeaderField> fields = {});
 

@@ -7,26 +7,26 @@
 
 namespace Host::Http {
 
-// What clients may take of the server.
+// Bounds on what clients can make the server spend.
 struct Limits {
     std::size_t maximumBody = std::size_t{1} << 20;    // bytes of a request
     std::size_t maximumHeader = std::size_t{16} << 10; // bytes of its first line and its fields
 
-    std::size_t maximumDepth = 64; // of elements in one another
+    std::size_t maximumDepth = 64; // of nested elements
 
     std::size_t maximumConnections = 256;
     std::size_t maximumConnectionsPerAddress = 64; // an IPv6 network of 64 bits is one address
 
-    // Operations that run at a time, and those that wait for their turn.
+    // Operations and password checks that run at a time, and those that wait for that.
     std::size_t workers = 4;
     std::size_t maximumQueue = 128;
 
-    // Of answers that clients have yet to fetch, all together, but for one that is alone: a sensor
-    // takes four kilobytes. Those of operations that run come on top.
+    // In the answers that clients have yet to fetch, except in one that is alone. A sensor takes
+    // four kilobytes. The objects of operations that still run are not included.
     std::size_t maximumUnsentObjects = 200'000;
 
-    // How long a connection may be still, be it that the client takes nothing of its answer, how
-    // long a request may take to come in, and how long the client may take to fetch the answer.
+    // How long a connection may transfer nothing in either direction, how long a request may take
+    // to arrive, and how long the client may take to fetch the answer.
     std::chrono::seconds idleTimeout{60};
     std::chrono::seconds requestTimeout{30};
     std::chrono::seconds answerTimeout{600};

@@ -22,7 +22,7 @@ void requireProtection(const Address& address, const ListenWishes& wishes)
                                 ", which needs TLS and sign-in; what is missing: " + missing);
 }
 
-// Whether all who can reach the other one reach the first, too.
+// Returns whether the first endpoint includes the other one.
 bool covers(const Endpoint& first, const Endpoint& other)
 {
     return first.isEncrypted == other.isEncrypted && first.address.port() == other.address.port() &&
@@ -30,7 +30,8 @@ bool covers(const Endpoint& first, const Endpoint& other)
            (first.address.isAny() || first.address.host() == other.address.host());
 }
 
-// Two that cover one another would be in each other's way.
+// Adds an endpoint unless one of them includes it, and removes those that it includes: the system
+// refuses to bind both.
 void add(std::vector<Endpoint>& endpoints, const Endpoint& added)
 {
     if (std::any_of(endpoints.begin(), endpoints.end(),

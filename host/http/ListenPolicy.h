@@ -1,7 +1,5 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Where the server listens, and what it needs for that.
-
 #pragma once
 
 #include "host/http/Address.h"
@@ -23,15 +21,14 @@ struct ListenWishes {
 struct Endpoint {
     Address address;
     bool isEncrypted = false;
-    // Nobody asked for it by name: it does no harm when the machine lacks it.
+    // A default that is left out where the machine does not have the address.
     bool isOptional = false;
 };
 
-// Loopback addresses are served without TLS, and with it too where there is a certificate; all
-// others with TLS only, and only to clients that sign in. None is there twice, nor beside 0.0.0.0
-// or
-// :: that includes it. Throws std::invalid_argument saying
-// what is missing for that, or what is no address.
+// Returns where the server listens. Loopback addresses are served without TLS, and with TLS too
+// where there is a certificate; other addresses are served with TLS only, and only to clients that
+// sign in. An endpoint that another one includes is left out. Throws std::invalid_argument when the
+// certificate or the passwords for that are missing, and for a text that is no address.
 std::vector<Endpoint> endpointsFor(const ListenWishes& wishes);
 
 } // namespace Host::Http

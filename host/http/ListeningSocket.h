@@ -8,36 +8,34 @@
 
 namespace Host::Http {
 
-// A socket on which clients can connect from its construction on; they wait until somebody
-// accepts them.
+// A socket that listens from its construction on. The system queues clients until they are
+// accepted.
 class ListeningSocket {
 public:
-    // Throws std::runtime_error naming the address and the reason, std::system_error with the
-    // error's code among them.
+    // Throws std::system_error with the address and the reason.
     explicit ListeningSocket(const Endpoint& endpoint);
     ~ListeningSocket() { close(); }
     ListeningSocket(ListeningSocket&& other) noexcept;
     ListeningSocket& operator=(ListeningSocket&&) = delete;
 
-    // With the actual port where any was wished for.
+    // Returns the address with its actual port.
     const Address& address() const { return address_; }
     bool isEncrypted() const { return isEncrypted_; }
     int descriptor() const { return descriptor_; }
 
-    // Nobody can connect any more; the descriptor stays valid. Idempotent.
+    // Refuses further clients. The descriptor stays valid. Idempotent.
     void refuse();
 
-    // Idempotent.
+private:
     void close();
 
-private:
     Address address_;
     bool isEncrypted_;
     int descriptor_;
 };
 
-// Listens on all of them; an optional one that this machine does not have is left out and told to
-// the log. Where any port will do, the addresses share one if they can.
+// Listens on all endpoints. An optional one that the machine does not have is left out and reported
+// to the log. Addresses whose port is 0 share one free port where they can.
 std::vector<ListeningSocket> listenOn(std::vector<Endpoint> endpoints);
 
 } // namespace Host::Http

@@ -15,7 +15,7 @@ namespace Host::Http {
 
 namespace {
 
-// So much of an answer is written before it is sent. One that is no longer has a known length.
+// The part of an answer that is written before it is sent. A shorter answer has a known length.
 constexpr std::size_t answerHead = std::size_t{64} << 10;
 
 } // namespace
@@ -25,7 +25,7 @@ void PendingAnswer::begin(std::unique_ptr<CimXml::Answer> answer, UnsentObjects&
     answer_ = std::move(answer);
     while (text_.size() < answerHead)
         if (!answer_->append(text_))
-            return end();
+            return drop();
     share_ = unsent.hold(answer_->heldObjects());
     if (share_)
         return;
@@ -37,12 +37,6 @@ void PendingAnswer::begin(std::unique_ptr<CimXml::Answer> answer, UnsentObjects&
 
 void PendingAnswer::drop()
 {
-    end();
-    text_ = {};
-}
-
-void PendingAnswer::end()
-{
     answer_.reset();
     share_.reset();
 }
@@ -50,15 +44,15 @@ void PendingAnswer::end()
 ::ssize_t PendingAnswer::read(char* to, std::size_t room) noexcept
 {
     try {
-        // The rest of a piece goes with the next one: each time the library is handed a little, it
-        // makes a packet of it.
+        // The rest of a piece is sent with the next one: libmicrohttpd makes a packet of every
+        // part, however short.
         if (answer_ && text_.size() - sent_ < room) {
             text_.erase(0, sent_);
             sent_ = 0;
         }
         while (answer_ && text_.size() < room)
             if (!answer_->append(text_))
-                end();
+                drop();
     } catch (...) {
         report({"read", "PendingAnswer", __LINE__}, "an answer broke off");
         return MHD_CONTENT_READER_END_WITH_ERROR;

@@ -1,7 +1,5 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// An answer on its way to the client.
-
 #pragma once
 
 #include "host/cimxml/OperationHandler.h"
@@ -15,30 +13,27 @@
 
 namespace Host::Http {
 
-// Used by one thread at a time.
+// An answer of which the client has yet to fetch a part. Not thread-safe.
 class PendingAnswer {
 public:
-    // Writes the beginning, which is all of it where that is short; the objects of what is left
-    // count among the unsent ones. Throws HttpError where there are too many of those, and
-    // std::bad_alloc.
+    // Writes the beginning of the answer, or all of a short one; the objects of the rest count
+    // among the unsent ones. Throws HttpError where those are too many, and std::bad_alloc.
     void begin(std::unique_ptr<CimXml::Answer> answer, UnsentObjects& unsent);
-    // As if it had never begun.
+    // Destroys the objects that are not written yet.
     void drop();
 
-    // Whether nothing is left to be written: all of it is in the text.
+    // Returns whether the text holds all of the answer.
     bool isWhole() const { return answer_ == nullptr; }
     const std::string& text() const { return text_; }
 
-    // The next part of one that is not whole; what the library expects of a content reader.
+    // Reads the next part of an answer that is not whole, as an MHD_ContentReaderCallback does.
     ::ssize_t read(char* to, std::size_t room) noexcept;
 
 private:
-    void end();
-
     UnsentObjects::Share share_;
-    std::unique_ptr<CimXml::Answer> answer_; // goes before its share
+    std::unique_ptr<CimXml::Answer> answer_; // destroyed before its share
     std::string text_;
-    std::size_t sent_ = 0; // of the text
+    std::size_t sent_ = 0; // bytes of the text
 };
 
 } // namespace Host::Http

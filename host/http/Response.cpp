@@ -36,7 +36,7 @@ Response::Response(MHD_Response* response) : response_(response)
 
 Response Response::whole(const std::string& text)
 {
-    // The library writes nothing to it.
+    // The library does not change the text.
     return Response(::MHD_create_response_from_buffer(
         text.size(), const_cast<char*>(text.data()), MHD_RESPMEM_PERSISTENT));
 }
@@ -49,7 +49,7 @@ Response Response::inPieces(PendingAnswer& answer)
 
 void Response::add(const HeaderField& field)
 {
-    // The library takes no empty value, but one that a reader sees as empty.
+    // The library refuses an empty value. A parser removes the blank.
     const char* const value = field.value.empty() ? " " : field.value.c_str();
     if (::MHD_add_response_header(response_.get(), field.name.c_str(), value) != MHD_YES)
         throw std::bad_alloc();

@@ -14,19 +14,20 @@ namespace Host::Http {
 
 class PendingAnswer;
 
-// An answer with its head, ready to be sent. All but the destructor throw std::bad_alloc.
+// The header fields and the body of an answer, as libmicrohttpd sends them. All functions throw
+// std::bad_alloc.
 class Response {
 public:
-    // The text must stay as it is until the request ends.
+    // Creates one whose body is the text, which must not change until the request ends.
     static Response whole(const std::string& text);
-    // Which is read until then.
+    // Creates one whose body is read from the answer, which must exist until the request ends.
     static Response inPieces(PendingAnswer& answer);
 
     void add(const HeaderField& field);
-    // The connection is closed behind it, and the answer says so.
+    // Has the connection closed after the answer, which says so.
     void endConnection();
 
-    // False when the library does not take it.
+    // Returns false when the library refuses it.
     bool queue(MHD_Connection& connection, unsigned status);
 
 private:

@@ -28,22 +28,9 @@ constexpr std::size_t maximumSize = std::size_t{1} << 20;
     failAt(file, std::system_category().message(errno));
 }
 
-class OpenFile {
-public:
-    explicit OpenFile(const std::string& file)
-        : descriptor_(::open(file.c_str(), O_RDONLY | O_CLOEXEC | O_NONBLOCK))
-    {
-        if (descriptor_ < 0)
-            failByErrno(file);
-    }
-    ~OpenFile() { ::close(descriptor_); }
-    OpenFile(const OpenFile&) = delete;
-    OpenFile& operator=(const OpenFile&) = delete;
-
-    int descriptor() const { return descriptor_; }
-
-private:
-    int descriptor_;
+struct Descriptor {
+    ~Descriptor() { ::close(number); }
+    const int number;
 };
 
 std::string readAll(int descriptor, const std::string& file)
@@ -64,16 +51,9 @@ std::string readAll(int descriptor, const std::string& file)
     }
 }
 
-void requireRegular(const struct stat& status, const std::string& file)
-{
-    if (!S_ISREG(status.st_mode))
-        failAt(file, "it is no regular file");
-}
-
-// An owner can give himself any right.
+// The owner's rights are not checked: an owner can change them.
 void requireSecrecy(const struct stat& status, const std::string& file)
 {
-    requireRegular(status, file);
     if (status.st_uid != 0 && status.st_uid != ::geteuid())
         failAt(file, "it belongs neither to root nor to the user who reads it (chown mends that)");
     if ((status.st_mode & (S_IWGRP | S_IRWXO)) != 0)
@@ -81,27 +61,30 @@ void requireSecrecy(const struct stat& status, const std::string& file)
                      "640 mends that)");
 }
 
-std::string readFile(
-    const std::string& file, void (*requireFit)(const struct stat& status, const std::string& file))
+std::string readFile(const std::string& file, bool isSecret)
 {
-    const OpenFile open(file);
+    // Without O_NONBLOCK, opening a FIFO would wait for its writer.
+    const Descriptor descriptor{::open(file.c_str(), O_RDONLY | O_CLOEXEC | O_NONBLOCK)};
     struct stat status = {};
-    if (::fstat(open.descriptor(), &status) != 0)
+    if (descriptor.number < 0 || ::fstat(descriptor.number, &status) != 0)
         failByErrno(file);
-    requireFit(status, file);
-    return readAll(open.descriptor(), file);
+    if (!S_ISREG(status.st_mode))
+        failAt(file, "it is no regular file");
+    if (isSecret)
+        requireSecrecy(status, file);
+    return readAll(descriptor.number, file);
 }
 
 } // namespace
 
 std::string readSecretFile(const std::string& file)
 {
-    return readFile(file, requireSecrecy);
+    return readFile(file, true);
 }
 
 std::string readPublicFile(const std::string& file)
 {
-    return readFile(file, requireRegular);
+    return readFile(file, false);
 }
 
 } // namespace Host::Http

@@ -8,7 +8,7 @@
 
 namespace Host::Http {
 
-// How many objects are in memory because clients have yet to fetch the answers they are in.
+// Counts the objects that are in memory because clients have yet to fetch the answers with them.
 // Thread-safe.
 class UnsentObjects {
 public:
@@ -18,17 +18,17 @@ public:
         std::size_t count;
         void operator()(UnsentObjects* all) const { all->release(count); }
     };
-    // They count until it goes, which must be before this object.
+    // The objects count until it is destroyed, which must be before the UnsentObjects are.
     using Share = std::unique_ptr<UnsentObjects, Release>;
 
-    // Null where there would be too many. An answer that is larger than all of them may be finds
-    // room when there is no other, or nobody would ever get it.
+    // Returns null where the objects would exceed the maximum. A single answer may exceed it, since
+    // no client would ever get it otherwise.
     Share hold(std::size_t count)
     {
         const std::lock_guard lock(mutex_);
-        const bool isMuch = held_ > 0 && count > 0 && held_ + count > maximum_;
-        held_ += isMuch ? 0 : count;
-        return Share(isMuch ? nullptr : this, Release{count});
+        const bool areTooMany = held_ > 0 && count > 0 && held_ + count > maximum_;
+        held_ += areTooMany ? 0 : count;
+        return Share(areTooMany ? nullptr : this, Release{count});
     }
 
 private:
