@@ -7,7 +7,7 @@
 #include "host/broker/Refusal.h"
 #include "host/manager/SensorProfile.h"
 #include "tools/cim/Classes.h"
-#include "tools/cim/PathReader.h"
+#include "tools/cim/PathText.h"
 
 #include <stdexcept>
 
@@ -77,11 +77,6 @@ const Host::Instance* ProviderClient::sensor(std::string_view deviceId)
 const Host::ObjectPath* ProviderClient::readPath(std::string_view text) const
 {
     return Tools::readPath(request_->arena(), *classes_, text);
-}
-
-std::string pathOf(const Host::Instance& instance)
-{
-    return instance.objectPath().toText();
 }
 
 } // namespace Tools

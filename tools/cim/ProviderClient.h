@@ -65,7 +65,4 @@ private:
     std::optional<Host::Request> request_;
 };
 
-// Host and key values included, as a path is written in a URI.
-std::string pathOf(const Host::Instance& instance);
-
 } // namespace Tools

@@ -4,7 +4,6 @@
 
 #include "host/broker/Array.h"
 #include "host/broker/Instance.h"
-#include "tools/cim/Integers.h"
 #include "tools/cim/Units.h"
 
 #include <algorithm>
@@ -32,6 +31,18 @@ struct Label {
 constexpr std::array labels = {Label{5, "Pred. Failure"}, Label{8, "Starting"},
     Label{9, "Stopping"}, Label{10, "Stopped"}, Label{noContact, "No Contact"},
     Label{lostCommunication, "Lost Comm."}, Label{15, "Dormant"}};
+
+// Returns an integer of any width and sign; nothing for a null, for another type and for what an
+// int64 cannot hold.
+std::optional<std::int64_t> integerOf(const Host::Value& value)
+{
+    if (const auto number = value.signedInteger())
+        return number;
+    const auto number = value.unsignedInteger();
+    if (!number || *number > std::numeric_limits<std::int64_t>::max())
+        return std::nullopt;
+    return static_cast<std::int64_t>(*number);
+}
 
 } // namespace
 

@@ -1,13 +1,10 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// In which form an answer is printed.
+// The form in which an answer is printed.
 
 #pragma once
 
-#include "tools/commands/ColorOption.h"
-#include "tools/output/Terminal.h"
-
-#include <cstddef>
+#include <string>
 
 namespace CLI {
 class App;
@@ -15,18 +12,19 @@ class App;
 
 namespace Tools {
 
+// The object must outlive the parser.
 class DisplayOptions {
 public:
-    // Adds --json and --color; the object must outlive the parser.
-    void addTo(CLI::App& parser);
+    void addJson(CLI::App& parser);
+    void addColor(CLI::App& parser);
 
     bool isJson() const { return isJson_; }
-    bool isColored() const { return color_.isColored(); }
-    std::size_t width() const { return outputWidth(); }
+    // Whether the option, or else the environment, asks for colors on standard output.
+    bool isColored() const;
 
 private:
     bool isJson_ = false;
-    ColorOption color_;
+    std::string color_ = "auto";
 };
 
 } // namespace Tools

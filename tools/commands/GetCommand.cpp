@@ -10,6 +10,7 @@
 #include "tools/output/JsonDocument.h"
 #include "tools/output/Output.h"
 #include "tools/output/PropertyList.h"
+#include "tools/output/Terminal.h"
 
 #include <CLI/CLI.hpp>
 
@@ -29,7 +30,8 @@ public:
             ->type_name("");
         source_.addModel(parser());
         source_.addProvider(parser());
-        display_.addTo(parser());
+        display_.addJson(parser());
+        display_.addColor(parser());
     }
 
     ExitCode run(Output& out) override
@@ -53,7 +55,7 @@ private:
         if (display_.isJson())
             writeJson(out, found.object->className(), {found.object});
         else
-            out.write(propertyList(*found.object, display_.width(), display_.isColored()));
+            out.write(propertyList(*found.object, outputWidth(), display_.isColored()));
         return true;
     }
 

@@ -10,6 +10,7 @@
 #include "tools/output/ObjectTable.h"
 #include "tools/output/Output.h"
 #include "tools/output/SensorTable.h"
+#include "tools/output/Terminal.h"
 
 #include <CLI/CLI.hpp>
 
@@ -37,7 +38,8 @@ public:
             ->type_name("");
         source_.addModel(parser());
         source_.addProvider(parser());
-        display_.addTo(parser());
+        display_.addJson(parser());
+        display_.addColor(parser());
         parser().footer(listFooter);
     }
 
@@ -70,9 +72,9 @@ private:
         if (display_.isJson())
             writeJson(out, className_, objects);
         else if (className_ == sensorClass)
-            out.write(sensorTable(objects, display_.width(), display_.isColored()));
+            out.write(sensorTable(objects, outputWidth(), display_.isColored()));
         else
-            out.write(objectTable(objects, display_.width(), display_.isColored()));
+            out.write(objectTable(objects, outputWidth(), display_.isColored()));
         return true;
     }
 

@@ -7,8 +7,8 @@
 #include "tools/SourceOptions.h"
 #include "tools/cim/AssociationGraph.h"
 #include "tools/cim/ProviderClient.h"
-#include "tools/commands/ColorOption.h"
 #include "tools/commands/Commands.h"
+#include "tools/commands/DisplayOptions.h"
 #include "tools/output/ObjectTree.h"
 #include "tools/output/Output.h"
 #include "tools/output/Terminal.h"
@@ -35,7 +35,7 @@ public:
             ->type_name("");
         source_.addModel(parser());
         source_.addProvider(parser());
-        color_.addTo(parser());
+        display_.addColor(parser());
         parser().footer(walkFooter);
     }
 
@@ -60,7 +60,7 @@ private:
             return ExitCode::nothingFound;
         AssociationGraph graph;
         const bool isWhole = addAssociations(provider, graph);
-        const TreeStyle style = {outputWidth(), color_.isColored(), isUtf8Locale()};
+        const TreeStyle style = {outputWidth(), display_.isColored(), isUtf8Locale()};
         for (const Host::Instance* const root : roots)
             writeTree(out, graph, graph.indexOf(root->objectPath()), style);
         return isWhole ? ExitCode::success : ExitCode::failure;
@@ -101,7 +101,7 @@ private:
 
     std::optional<std::string> wanted_;
     SourceOptions source_;
-    ColorOption color_;
+    DisplayOptions display_;
 };
 
 } // namespace

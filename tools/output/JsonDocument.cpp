@@ -66,7 +66,7 @@ Json jsonOf(const Host::Instance& instance)
     for (const Host::NamedValue& property : instance.properties())
         if (Json value = jsonOf(property.value); !value.is_null())
             properties[std::string(*property.name->text())] = std::move(value);
-    return {{"path", pathOf(instance)}, {"properties", std::move(properties)}};
+    return {{"path", instance.objectPath().toText()}, {"properties", std::move(properties)}};
 }
 
 // Its lines indented by the depth at which it stands; texts hold no line feeds.

@@ -24,7 +24,6 @@ namespace {
 
 using Objects = std::vector<const Host::Instance*>;
 
-
 // Beside the references, which have other names in each class, in this order.
 constexpr std::array<std::string_view, 7> shownProperties = {"DeviceID", "InstanceID", "Name",
     "ElementName", "EnabledState", "HealthState", "OperationalStatus"};

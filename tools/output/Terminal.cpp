@@ -63,10 +63,8 @@ bool isUtf8Locale()
     return false;
 }
 
-bool isColorWanted(ColorChoice choice)
+bool isColorTerminal()
 {
-    if (choice != ColorChoice::automatic)
-        return choice == ColorChoice::always;
     return setting("NO_COLOR").empty() && setting("TERM") != "dumb" && !setting("TERM").empty() &&
            ::isatty(STDOUT_FILENO) != 0;
 }

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-#include "tools/cim/PathReader.h"
+#include "tools/cim/PathText.h"
 
 #include "host/broker/ClassInformation.h"
 #include "host/broker/Names.h"

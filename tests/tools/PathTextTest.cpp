@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-#include "tools/cim/PathReader.h"
+#include "tools/cim/PathText.h"
 
 #include "host/broker/Broker.h"
 #include "host/broker/ObjectPath.h"
@@ -13,7 +13,7 @@
 
 namespace {
 
-class PathReaderTest : public testing::Test {
+class PathTextTest : public testing::Test {
 protected:
     const Host::ObjectPath* read(std::string_view text)
     {
@@ -43,7 +43,7 @@ protected:
     Host::Request request_{broker_};
 };
 
-TEST_F(PathReaderTest, ReadsWhatIsWritten)
+TEST_F(PathTextTest, ReadsWhatIsWritten)
 {
     for (const char* const text : {"//host.example.org:5989/root/"
                                    "cimv2:ZUMLO_ComputerSystem.CreationClassName=\"x\",Name=\"a, "
@@ -56,7 +56,7 @@ TEST_F(PathReaderTest, ReadsWhatIsWritten)
         EXPECT_EQ(again(text), text);
 }
 
-TEST_F(PathReaderTest, ReferencesArePathsAndTextsAreTexts)
+TEST_F(PathTextTest, ReferencesArePathsAndTextsAreTexts)
 {
     const Host::ObjectPath* const path =
         read("ZUMLO_SensorSystemDevice.GROUPcomponent=\"ZUMLO_ComputerSystem.Name=\\\"n\\\"\","
@@ -65,20 +65,20 @@ TEST_F(PathReaderTest, ReferencesArePathsAndTextsAreTexts)
     EXPECT_TRUE(path->key("Other")->text());
 }
 
-TEST_F(PathReaderTest, NamespaceIsTheUsualOneWhenNoneIsGiven)
+TEST_F(PathTextTest, NamespaceIsTheUsualOneWhenNoneIsGiven)
 {
     EXPECT_EQ(
         again("ZUMLO_ComputerSystem.Name=\"n\""), "root/cimv2:ZUMLO_ComputerSystem.Name=\"n\"");
 }
 
-TEST_F(PathReaderTest, WhatNamesNoKnownClassIsMeantAsSomethingElse)
+TEST_F(PathTextTest, WhatNamesNoKnownClassIsMeantAsSomethingElse)
 {
     for (const char* const text : {"", "CPU 1:/cpu0/temp1", "a.b=\"c\"", "//", "//h", "//h/n:C.k=1",
              "ZUMLO_ComputerSystem", "+12V:/board/in1", ":", ".", "\"", "x:y.z=\"ZUMLO_"})
         EXPECT_EQ(read(text), nullptr) << text;
 }
 
-TEST_F(PathReaderTest, MistakesAreNamedWithTheirColumn)
+TEST_F(PathTextTest, MistakesAreNamedWithTheirColumn)
 {
     const std::string start = "ZUMLO_ComputerSystem.";
     EXPECT_EQ(mistakeIn(start), "column 22: expected the name of a key and =");
@@ -95,7 +95,7 @@ TEST_F(PathReaderTest, MistakesAreNamedWithTheirColumn)
         "column 41: expected the path of an object of a known class, in quotes");
 }
 
-TEST_F(PathReaderTest, EndlessNestingIsRefused)
+TEST_F(PathTextTest, EndlessNestingIsRefused)
 {
     std::string path = "ZUMLO_ComputerSystem.Name=\"n\"";
     for (int depth = 0; depth < 9; ++depth) {
