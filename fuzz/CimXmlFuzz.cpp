@@ -7,9 +7,9 @@
 #include "host/broker/ObjectPath.h"
 #include "host/broker/Refusal.h"
 #include "host/broker/Request.h"
-#include "host/cimxml/AnswerWriter.h"
 #include "host/cimxml/Message.h"
 #include "host/cimxml/RequestError.h"
+#include "host/cimxml/ResponseWriter.h"
 #include "host/repository/Compiler.h"
 
 #include <cstddef>
@@ -52,18 +52,18 @@ std::optional<Operation> tryRead(std::string_view text)
     return std::nullopt;
 }
 
-// Objects of an operation make an answer that is itself well-formed, though no request.
-void requireWellFormedAnswer(std::string_view request, const Operation& operation)
+// The objects of an operation make a response that is itself well-formed, though no request.
+void requireWellFormedResponse(std::string_view request, const Operation& operation)
 {
-    std::string answer;
-    Host::CimXml::AnswerWriter writer(Message(request), operation.kind, classes(),
-        {"host", operation.nameSpace}, operation.selection,
-        [&answer](std::string_view piece) { answer += piece; });
+    Host::CimXml::ResponseWriter writer(Message(request), operation.kind, classes(),
+        {"host", operation.nameSpace}, operation.selection);
+    std::string response;
+    writer.begin(response);
     if (operation.path != nullptr)
-        writer.path(*operation.path);
-    writer.finish();
+        writer.path(response, *operation.path);
+    writer.finish(response);
     try {
-        const Message none(answer);
+        const Message none(response);
         std::abort();
     } catch (const Host::CimXml::RequestError& error) {
         if (error.outcome() == Host::CimXml::Outcome::requestNotWellFormed)
@@ -94,7 +94,7 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
     const Host::Request request(broker);
     const std::string_view text(reinterpret_cast<const char*>(data), size);
     if (const auto operation = tryRead(text)) {
-        requireWellFormedAnswer(text, *operation);
+        requireWellFormedResponse(text, *operation);
         if (operation->path != nullptr)
             requireRoundTrip(*operation->path);
     }

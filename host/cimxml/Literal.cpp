@@ -181,24 +181,35 @@ std::optional<Value> readNumber(Arena& arena, std::string_view text)
 
 void appendLiteral(std::string& out, const Value& value)
 {
-    if (const auto text = value.text()) {
-        appendEscaped(out, *text);
-    } else if (const auto truth = value.boolean()) {
-        out += *truth ? "TRUE" : "FALSE";
-    } else if (const auto number = value.unsignedInteger()) {
-        if (value.type() == CMPI_char16)
-            appendCharacter(out, static_cast<char32_t>(*number));
-        else
-            appendNumber(out, *number);
-    } else if (const auto signedNumber = value.signedInteger()) {
-        appendNumber(out, *signedNumber);
-    } else if (const auto real = value.real()) {
-        if (value.type() == CMPI_real32)
-            appendReal(out, static_cast<float>(*real));
-        else
-            appendReal(out, *real);
-    } else if (const DateTime* const time = value.dateTime()) {
-        out += time->toText();
+    if (value.isNull())
+        return;
+    switch (value.type()) {
+    case CMPI_string:
+        return appendEscaped(out, value.text().value_or(""));
+    case CMPI_boolean:
+        out += *value.boolean() ? "TRUE" : "FALSE";
+        return;
+    case CMPI_char16:
+        return appendCharacter(out, static_cast<char32_t>(*value.unsignedInteger()));
+    case CMPI_uint8:
+    case CMPI_uint16:
+    case CMPI_uint32:
+    case CMPI_uint64:
+        return appendNumber(out, *value.unsignedInteger());
+    case CMPI_sint8:
+    case CMPI_sint16:
+    case CMPI_sint32:
+    case CMPI_sint64:
+        return appendNumber(out, *value.signedInteger());
+    case CMPI_real32:
+        return appendReal(out, static_cast<float>(*value.real()));
+    case CMPI_real64:
+        return appendReal(out, *value.real());
+    case CMPI_dateTime:
+        out += value.dateTime()->toText();
+        return;
+    default:
+        return;
     }
 }
 

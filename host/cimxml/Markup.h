@@ -1,7 +1,7 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Elements as they are written: always with a start tag and an end tag, since some clients do
-// not know empty-element tags, with the five named entities and without CDATA.
+// Elements as they are written: always with a start tag and an end tag, since some clients do not
+// know empty-element tags, with the five predefined entities and without CDATA.
 
 #pragma once
 
@@ -12,36 +12,25 @@
 
 namespace Host::CimXml {
 
-// The start tag is written on construction, the end tag on destruction. Attributes come before
-// any content. The text written to must outlive it.
+// Appends the start tag on construction and the end tag on destruction. Attributes come before any
+// content. The text must outlive it.
 class Markup {
 public:
     // The name must outlive it too.
     Markup(std::string& out, std::string_view name) : out_(out), name_(name)
     {
-        out_ += '<';
-        out_ += name_;
-        out_ += '>';
+        out_.append(1, '<').append(name_) += '>';
     }
-    ~Markup()
-    {
-        out_ += '<';
-        out_ += '/';
-        out_ += name_;
-        out_ += '>';
-    }
+    ~Markup() { out_.append("</").append(name_) += '>'; }
     Markup(const Markup&) = delete;
     Markup& operator=(const Markup&) = delete;
 
     Markup& attribute(std::string_view name, std::string_view value)
     {
         out_.back() = ' ';
-        out_ += name;
-        out_ += '=';
-        out_ += '"';
+        out_.append(name).append("=\"");
         appendEscaped(out_, value);
-        out_ += '"';
-        out_ += '>';
+        out_ += "\">";
         return *this;
     }
 

@@ -4,7 +4,7 @@
 
 #pragma once
 
-#include "host/cimxml/PropertySelection.h"
+#include "host/cimxml/ObjectSelection.h"
 
 #include <cstdint>
 #include <optional>
@@ -57,7 +57,7 @@ struct Operation {
     const ObjectPath* path = nullptr; // of the instance, or of an association's source
 
     bool deepInheritance = false;
-    PropertySelection selection; // with LocalOnly and the like, and the property list
+    ObjectSelection selection; // with LocalOnly and the like, and the property list
 
     // References have their association class in resultClass.
     std::string associationClass;

@@ -21,9 +21,9 @@ struct Caller {
 
 // The answer to one message, told in pieces. Used by one thread at a time, not always the one it
 // was made on.
-class Answer {
+class Response {
 public:
-    virtual ~Answer() = default;
+    virtual ~Response() = default;
 
     // Appends what comes next, some kilobytes at most for an answer of many objects; false when
     // the answer has ended and nothing was appended.
@@ -42,7 +42,7 @@ public:
     // failure is an answer too. What the answer holds, it holds once, as objects, and writes
     // them when its pieces are asked for. Throws RequestError for a message in which an element
     // lacks something, and std::bad_alloc.
-    virtual std::unique_ptr<Answer> answer(const Message& message, const Caller& caller) = 0;
+    virtual std::unique_ptr<Response> answer(const Message& message, const Caller& caller) = 0;
 };
 
 } // namespace Host::CimXml

@@ -20,7 +20,7 @@ constexpr std::size_t answerHead = std::size_t{64} << 10;
 
 } // namespace
 
-void PendingAnswer::begin(std::unique_ptr<CimXml::Answer> answer, UnsentObjects& unsent)
+void PendingAnswer::begin(std::unique_ptr<CimXml::Response> answer, UnsentObjects& unsent)
 {
     answer_ = std::move(answer);
     while (text_.size() < answerHead)

@@ -18,7 +18,7 @@ class PendingAnswer {
 public:
     // Writes the beginning of the answer, or all of a short one; the objects of the rest count
     // among the unsent ones. Throws HttpError where those are too many, and std::bad_alloc.
-    void begin(std::unique_ptr<CimXml::Answer> answer, UnsentObjects& unsent);
+    void begin(std::unique_ptr<CimXml::Response> answer, UnsentObjects& unsent);
     // Destroys the objects that are not written yet.
     void drop();
 
@@ -31,7 +31,7 @@ public:
 
 private:
     UnsentObjects::Share share_;
-    std::unique_ptr<CimXml::Answer> answer_; // destroyed before its share
+    std::unique_ptr<CimXml::Response> answer_; // destroyed before its share
     std::string text_;
     std::size_t sent_ = 0; // bytes of the text
 };

@@ -27,13 +27,13 @@ Manager::Association associationOf(const Operation& operation)
         orNull(operation.role), orNull(operation.resultRole)};
 }
 
-void addDeclarations(AnswerObjects& found, const std::vector<const ClassDeclaration*>& classes)
+void addDeclarations(FoundObjects& found, const std::vector<const ClassDeclaration*>& classes)
 {
     for (const ClassDeclaration* const declared : classes)
         found.add(declared);
 }
 
-void addNames(AnswerObjects& found, const std::vector<const ClassDeclaration*>& classes)
+void addNames(FoundObjects& found, const std::vector<const ClassDeclaration*>& classes)
 {
     for (const ClassDeclaration* const declared : classes)
         found.add(ClassName{declared->name});
@@ -42,7 +42,7 @@ void addNames(AnswerObjects& found, const std::vector<const ClassDeclaration*>& 
 } // namespace
 
 void AssociationOperations::associators(
-    const Operation& operation, Request& request, AnswerObjects& found) const
+    const Operation& operation, Request& request, FoundObjects& found) const
 {
     if (operation.path == nullptr)
         return addDeclarations(found, associatedClasses(classes_, operation));
@@ -54,7 +54,7 @@ void AssociationOperations::associators(
 }
 
 void AssociationOperations::associatorNames(
-    const Operation& operation, Request& request, AnswerObjects& found) const
+    const Operation& operation, Request& request, FoundObjects& found) const
 {
     if (operation.path == nullptr)
         return addNames(found, associatedClasses(classes_, operation));
@@ -65,7 +65,7 @@ void AssociationOperations::associatorNames(
 }
 
 void AssociationOperations::references(
-    const Operation& operation, Request& request, AnswerObjects& found) const
+    const Operation& operation, Request& request, FoundObjects& found) const
 {
     if (operation.path == nullptr)
         return addDeclarations(found, referringClasses(classes_, operation));
@@ -77,7 +77,7 @@ void AssociationOperations::references(
 }
 
 void AssociationOperations::referenceNames(
-    const Operation& operation, Request& request, AnswerObjects& found) const
+    const Operation& operation, Request& request, FoundObjects& found) const
 {
     if (operation.path == nullptr)
         return addNames(found, referringClasses(classes_, operation));

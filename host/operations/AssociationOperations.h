@@ -5,7 +5,7 @@
 #pragma once
 
 #include "host/cimxml/Operation.h"
-#include "host/operations/AnswerObjects.h"
+#include "host/operations/FoundObjects.h"
 
 namespace Host {
 
@@ -24,13 +24,13 @@ public:
     }
 
     void associators(
-        const CimXml::Operation& operation, Request& request, AnswerObjects& found) const;
+        const CimXml::Operation& operation, Request& request, FoundObjects& found) const;
     void associatorNames(
-        const CimXml::Operation& operation, Request& request, AnswerObjects& found) const;
+        const CimXml::Operation& operation, Request& request, FoundObjects& found) const;
     void references(
-        const CimXml::Operation& operation, Request& request, AnswerObjects& found) const;
+        const CimXml::Operation& operation, Request& request, FoundObjects& found) const;
     void referenceNames(
-        const CimXml::Operation& operation, Request& request, AnswerObjects& found) const;
+        const CimXml::Operation& operation, Request& request, FoundObjects& found) const;
 
 private:
     const Repository& classes_;

@@ -28,7 +28,7 @@ std::vector<const ClassDeclaration*> subclassesOf(
 
 } // namespace
 
-void getClass(const Repository& classes, const Operation& operation, AnswerObjects& found)
+void getClass(const Repository& classes, const Operation& operation, FoundObjects& found)
 {
     const auto* const declared = classes.findClass(operation.nameSpace, operation.className);
     if (declared == nullptr)
@@ -36,20 +36,19 @@ void getClass(const Repository& classes, const Operation& operation, AnswerObjec
     found.add(declared);
 }
 
-void enumerateClasses(const Repository& classes, const Operation& operation, AnswerObjects& found)
+void enumerateClasses(const Repository& classes, const Operation& operation, FoundObjects& found)
 {
     for (const ClassDeclaration* const declared : subclassesOf(classes, operation))
         found.add(declared);
 }
 
-void enumerateClassNames(
-    const Repository& classes, const Operation& operation, AnswerObjects& found)
+void enumerateClassNames(const Repository& classes, const Operation& operation, FoundObjects& found)
 {
     for (const ClassDeclaration* const declared : subclassesOf(classes, operation))
         found.add(ClassName{declared->name});
 }
 
-void getQualifier(const Repository& classes, const Operation& operation, AnswerObjects& found)
+void getQualifier(const Repository& classes, const Operation& operation, FoundObjects& found)
 {
     const auto* const declared =
         classes.findQualifier(operation.nameSpace, operation.qualifierName);
@@ -58,8 +57,7 @@ void getQualifier(const Repository& classes, const Operation& operation, AnswerO
     found.add(declared);
 }
 
-void enumerateQualifiers(
-    const Repository& classes, const Operation& operation, AnswerObjects& found)
+void enumerateQualifiers(const Repository& classes, const Operation& operation, FoundObjects& found)
 {
     for (const auto& declared : classes.findNamespace(operation.nameSpace)->qualifiers())
         found.add(declared.get());

@@ -5,7 +5,7 @@
 #pragma once
 
 #include "host/cimxml/Operation.h"
-#include "host/operations/AnswerObjects.h"
+#include "host/operations/FoundObjects.h"
 
 namespace Host {
 
@@ -14,19 +14,19 @@ class Repository;
 // All may be called from any thread, and add what they find to the answer.
 
 // Throws Refusal (CMPI_RC_ERR_NOT_FOUND) when there is no such class.
-void getClass(const Repository& classes, const CimXml::Operation& operation, AnswerObjects& found);
+void getClass(const Repository& classes, const CimXml::Operation& operation, FoundObjects& found);
 
 // The classes below the named one, or all from the roots on. Throw Refusal
 // (CMPI_RC_ERR_INVALID_CLASS) for a class that is not known.
 void enumerateClasses(
-    const Repository& classes, const CimXml::Operation& operation, AnswerObjects& found);
+    const Repository& classes, const CimXml::Operation& operation, FoundObjects& found);
 void enumerateClassNames(
-    const Repository& classes, const CimXml::Operation& operation, AnswerObjects& found);
+    const Repository& classes, const CimXml::Operation& operation, FoundObjects& found);
 
 // Throws Refusal (CMPI_RC_ERR_NOT_FOUND) when there is no such qualifier.
 void getQualifier(
-    const Repository& classes, const CimXml::Operation& operation, AnswerObjects& found);
+    const Repository& classes, const CimXml::Operation& operation, FoundObjects& found);
 void enumerateQualifiers(
-    const Repository& classes, const CimXml::Operation& operation, AnswerObjects& found);
+    const Repository& classes, const CimXml::Operation& operation, FoundObjects& found);
 
 } // namespace Host

@@ -36,19 +36,19 @@ Dispatcher::Dispatcher(const Repository& classes, Manager& manager, HostName hos
 {
 }
 
-std::unique_ptr<CimXml::Answer> Dispatcher::answer(
+std::unique_ptr<CimXml::Response> Dispatcher::answer(
     const CimXml::Message& message, const CimXml::Caller& caller)
 {
     pulls_.removeExpired();
     try {
         return carryOut(message, caller);
     } catch (const Refusal& refusal) {
-        return std::make_unique<WrittenAnswer>(
-            errorAnswer(message, statusCode(refusal.code()), refusal.what()));
+        return std::make_unique<WrittenResponse>(
+            errorResponse(message, statusCode(refusal.code()), refusal.what()));
     }
 }
 
-std::unique_ptr<CimXml::Answer> Dispatcher::carryOut(
+std::unique_ptr<CimXml::Response> Dispatcher::carryOut(
     const CimXml::Message& message, const CimXml::Caller& caller)
 {
     // What is read lives in the same memory as what is found, but the context can be made only
@@ -60,15 +60,15 @@ std::unique_ptr<CimXml::Answer> Dispatcher::carryOut(
                                            .nameSpace = operation.nameSpace,
                                            .principal = caller.principal,
                                            .acceptLanguage = caller.acceptLanguage});
-    AnswerObjects found(reading.shareArena());
+    FoundObjects found(reading.shareArena());
     const auto continuation = run(operation, request, caller.principal, found);
-    return std::make_unique<ObjectAnswer>(message, operation.kind, classes_,
+    return std::make_unique<ObjectResponse>(message, operation.kind, classes_,
         CimXml::Location{hostName_(), operation.nameSpace}, std::move(operation.selection),
         std::move(found), continuation);
 }
 
 std::optional<Continuation> Dispatcher::run(
-    Operation& operation, Request& request, const std::string& principal, AnswerObjects& found)
+    Operation& operation, Request& request, const std::string& principal, FoundObjects& found)
 {
     if (PullOperations::isOpening(operation.kind)) {
         pulls_.checkOpening(operation);
@@ -88,7 +88,7 @@ std::optional<Continuation> Dispatcher::run(
     }
 }
 
-void Dispatcher::runToTheEnd(const Operation& operation, Request& request, AnswerObjects& found)
+void Dispatcher::runToTheEnd(const Operation& operation, Request& request, FoundObjects& found)
 {
     switch (operation.kind) {
     case Kind::getInstance:

@@ -27,15 +27,15 @@ public:
     // REQUIRES: no request is active on this thread.
     // A failure is answered with the code of the Refusal it ends in; codes that are none of the
     // protocol's become CIM_ERR_FAILED.
-    std::unique_ptr<CimXml::Answer> answer(
+    std::unique_ptr<CimXml::Response> answer(
         const CimXml::Message& message, const CimXml::Caller& caller) override;
 
 private:
-    std::unique_ptr<CimXml::Answer> carryOut(
+    std::unique_ptr<CimXml::Response> carryOut(
         const CimXml::Message& message, const CimXml::Caller& caller);
     std::optional<Continuation> run(CimXml::Operation& operation, Request& request,
-        const std::string& principal, AnswerObjects& found);
-    void runToTheEnd(const CimXml::Operation& operation, Request& request, AnswerObjects& found);
+        const std::string& principal, FoundObjects& found);
+    void runToTheEnd(const CimXml::Operation& operation, Request& request, FoundObjects& found);
 
     const Repository& classes_;
     Manager& manager_;

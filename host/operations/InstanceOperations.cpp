@@ -17,14 +17,14 @@ namespace Host {
 using CimXml::Operation;
 
 void InstanceOperations::get(
-    const Operation& operation, Request& request, AnswerObjects& found) const
+    const Operation& operation, Request& request, FoundObjects& found) const
 {
     PropertyNames properties(operation.selection.properties);
     found.add(&manager_.getInstance(request.context(), *operation.path, properties.get()));
 }
 
 void InstanceOperations::enumerate(
-    const Operation& operation, Request& request, AnswerObjects& found) const
+    const Operation& operation, Request& request, FoundObjects& found) const
 {
     PropertyNames properties(operation.selection.properties);
     addWhole(found, [&](ResultSink& sink) {
@@ -34,7 +34,7 @@ void InstanceOperations::enumerate(
 }
 
 void InstanceOperations::enumerateNames(
-    const Operation& operation, Request& request, AnswerObjects& found) const
+    const Operation& operation, Request& request, FoundObjects& found) const
 {
     addWhole(found, [&](ResultSink& sink) {
         manager_.enumerateInstanceNames(
@@ -43,7 +43,7 @@ void InstanceOperations::enumerateNames(
 }
 
 void InstanceOperations::getProperty(
-    const Operation& operation, Request& request, AnswerObjects& found) const
+    const Operation& operation, Request& request, FoundObjects& found) const
 {
     const std::string& name = propertyOf(operation);
     PropertyNames properties(name);

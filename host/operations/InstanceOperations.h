@@ -5,7 +5,7 @@
 #pragma once
 
 #include "host/cimxml/Operation.h"
-#include "host/operations/AnswerObjects.h"
+#include "host/operations/FoundObjects.h"
 
 namespace Host {
 
@@ -23,15 +23,14 @@ public:
     {
     }
 
-    void get(const CimXml::Operation& operation, Request& request, AnswerObjects& found) const;
-    void enumerate(
-        const CimXml::Operation& operation, Request& request, AnswerObjects& found) const;
+    void get(const CimXml::Operation& operation, Request& request, FoundObjects& found) const;
+    void enumerate(const CimXml::Operation& operation, Request& request, FoundObjects& found) const;
     void enumerateNames(
-        const CimXml::Operation& operation, Request& request, AnswerObjects& found) const;
+        const CimXml::Operation& operation, Request& request, FoundObjects& found) const;
 
     // Throws Refusal (CMPI_RC_ERR_NO_SUCH_PROPERTY) for one that the class does not have.
     void getProperty(
-        const CimXml::Operation& operation, Request& request, AnswerObjects& found) const;
+        const CimXml::Operation& operation, Request& request, FoundObjects& found) const;
 
 private:
     // The name as it is declared.

@@ -24,7 +24,7 @@ public:
     // What answers the operations, for the process itself.
     Manager& manager() noexcept { return manager_; }
 
-    std::unique_ptr<CimXml::Answer> answer(
+    std::unique_ptr<CimXml::Response> answer(
         const CimXml::Message& message, const CimXml::Caller& caller) override
     {
         return dispatcher_.answer(message, caller);

@@ -4,8 +4,8 @@
 
 #pragma once
 
-#include "host/cimxml/PropertySelection.h"
-#include "host/operations/AnswerObjects.h"
+#include "host/cimxml/ObjectSelection.h"
+#include "host/operations/FoundObjects.h"
 #include "host/operations/OperationLimits.h"
 
 #include <chrono>
@@ -30,9 +30,9 @@ struct EnumerationOwner {
 
 struct OpenEnumeration {
     EnumerationOwner owner;
-    AnswerObjects waiting;
-    CimXml::PropertySelection selection; // for what is pulled
-    std::chrono::seconds timeout{};      // from one operation on it to the next
+    FoundObjects waiting;
+    CimXml::ObjectSelection selection; // for what is pulled
+    std::chrono::seconds timeout{};    // from one operation on it to the next
 };
 
 // May be used from any thread. Operations on one enumeration come one after another; what they
@@ -54,8 +54,8 @@ public:
     std::string open(OpenEnumeration enumeration);
 
     struct Pulled {
-        AnswerObjects objects;
-        CimXml::PropertySelection selection;
+        FoundObjects objects;
+        CimXml::ObjectSelection selection;
         bool isOver = false; // nothing is left; the enumeration is closed
     };
 

@@ -66,11 +66,11 @@ void PullOperations::checkOpening(const Operation& operation) const
 }
 
 Continuation PullOperations::open(
-    const Operation& operation, const std::string& principal, AnswerObjects& found)
+    const Operation& operation, const std::string& principal, FoundObjects& found)
 {
-    AnswerObjects first = found.takeFirst(countFor(operation));
+    FoundObjects first = found.takeFirst(countFor(operation));
     std::swap(first, found);
-    AnswerObjects& rest = first;
+    FoundObjects& rest = first;
     if (rest.size() == 0)
         return {};
     const auto timeout = operation.operationTimeout.value_or(limits_.defaultTimeout.count());
@@ -79,7 +79,7 @@ Continuation PullOperations::open(
 }
 
 Continuation PullOperations::pull(
-    Operation& operation, const std::string& principal, AnswerObjects& found)
+    Operation& operation, const std::string& principal, FoundObjects& found)
 {
     auto pulled = enumerations_.pull(
         operation.enumerationContext, ownerOf(operation, principal), countFor(operation));

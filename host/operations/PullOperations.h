@@ -5,7 +5,7 @@
 #pragma once
 
 #include "host/cimxml/Operation.h"
-#include "host/operations/ObjectAnswer.h"
+#include "host/operations/ObjectResponse.h"
 #include "host/operations/OpenEnumerations.h"
 
 #include <string>
@@ -28,11 +28,11 @@ public:
     // Leaves in the answer what the client wants at once and keeps the rest for it. Throws what
     // OpenEnumerations throws.
     Continuation open(
-        const CimXml::Operation& operation, const std::string& principal, AnswerObjects& found);
+        const CimXml::Operation& operation, const std::string& principal, FoundObjects& found);
 
     // The operation's selection becomes that of the enumeration.
     Continuation pull(
-        CimXml::Operation& operation, const std::string& principal, AnswerObjects& found);
+        CimXml::Operation& operation, const std::string& principal, FoundObjects& found);
     void close(const CimXml::Operation& operation, const std::string& principal);
 
     // Gives back the memory of enumerations whose time is over; to be called with all operations.

@@ -11,9 +11,9 @@
 
 namespace Host {
 
+using CimXml::ObjectSelection;
 using CimXml::Operation;
 using CimXml::OperationKind;
-using CimXml::PropertySelection;
 
 namespace {
 
@@ -61,7 +61,7 @@ std::vector<std::string> spelledAsDeclared(
 }
 
 // The properties of the class that are selected.
-void limitTo(const ClassDeclaration& declared, PropertySelection& selection)
+void limitTo(const ClassDeclaration& declared, ObjectSelection& selection)
 {
     std::vector<std::string> properties;
     for (const auto& property : declared.properties)
@@ -72,9 +72,9 @@ void limitTo(const ClassDeclaration& declared, PropertySelection& selection)
 
 } // namespace
 
-PropertySelection effectiveSelection(const Operation& operation, const Repository& classes)
+ObjectSelection effectiveSelection(const Operation& operation, const Repository& classes)
 {
-    PropertySelection selection = operation.selection;
+    ObjectSelection selection = operation.selection;
     if (!isOfClasses(operation.kind))
         selection.localOnly = false;
     if (selection.properties)

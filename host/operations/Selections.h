@@ -22,7 +22,7 @@ class Repository;
 // leaves the flag to its default would get next to nothing of an object whose class inherits
 // much. And where DeepInheritance is false, the list is no longer than the named class.
 // REQUIRES: the operation's namespace is known.
-CimXml::PropertySelection effectiveSelection(
+CimXml::ObjectSelection effectiveSelection(
     const CimXml::Operation& operation, const Repository& classes);
 
 // The CMPI_FLAG_ bits that stand for it.

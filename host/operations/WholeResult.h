@@ -4,7 +4,7 @@
 
 #include "host/broker/CollectedResult.h"
 #include "host/broker/Refusal.h"
-#include "host/operations/AnswerObjects.h"
+#include "host/operations/FoundObjects.h"
 
 #include <string>
 
@@ -13,7 +13,7 @@ namespace Host {
 // Runs what delivers to a sink and adds all it has delivered. Throws Refusal (CMPI_RC_ERR_FAILED)
 // when something delivered was no object: an answer that lacks it would not be true.
 template <typename Operation>
-void addWhole(AnswerObjects& found, const Operation& operation)
+void addWhole(FoundObjects& found, const Operation& operation)
 {
     CollectedResult result;
     operation(result);

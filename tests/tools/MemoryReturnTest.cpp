@@ -19,11 +19,11 @@
 
 namespace MemoryReturnTests {
 
-using Host::CimXml::Answer;
+using Host::CimXml::Response;
 
-class HeldAnswer : public Answer {
+class HeldResponse : public Response {
 public:
-    HeldAnswer(std::size_t objects, std::unique_ptr<char[]> last)
+    HeldResponse(std::size_t objects, std::unique_ptr<char[]> last)
         : objects_(objects), last_(std::move(last))
     {
     }
@@ -40,15 +40,15 @@ private:
 class WastefulHandler : public Host::CimXml::OperationHandler {
 public:
     explicit WastefulHandler(std::size_t objects) : objects_(objects) {}
-    std::unique_ptr<Answer> answer(
+    std::unique_ptr<Response> answer(
         const Host::CimXml::Message&, const Host::CimXml::Caller&) override
     {
-        std::unique_ptr<Answer> made;
+        std::unique_ptr<Response> made;
         std::thread([&] {
             std::vector<std::unique_ptr<char[]>> blocks(std::size_t{1} << 16);
             for (auto& block : blocks)
                 block = std::make_unique<char[]>(1024);
-            made = std::make_unique<HeldAnswer>(objects_, std::move(blocks.back()));
+            made = std::make_unique<HeldResponse>(objects_, std::move(blocks.back()));
         }).join();
         if (objects_ > 0)
             return made;
@@ -58,7 +58,7 @@ public:
 
 private:
     std::size_t objects_;
-    std::unique_ptr<Answer> kept_;
+    std::unique_ptr<Response> kept_;
 };
 
 std::size_t residentMegabytes()

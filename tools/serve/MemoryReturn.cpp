@@ -12,7 +12,7 @@ namespace Tools {
 
 namespace {
 
-using Host::CimXml::Answer;
+using Host::CimXml::Response;
 
 // Forty megabytes. To map them again takes a small part of the time that an answer of so many
 // takes.
@@ -22,31 +22,31 @@ constexpr std::size_t largeAnswer = 10'000;
 // take ten times as much and more.
 constexpr std::size_t largeMessage = std::size_t{64} << 10;
 
-class ReturningAnswer : public Answer {
+class ReturningResponse : public Response {
 public:
-    explicit ReturningAnswer(std::unique_ptr<Answer> answer) : answer_(std::move(answer)) {}
-    ~ReturningAnswer() override
+    explicit ReturningResponse(std::unique_ptr<Response> answer) : answer_(std::move(answer)) {}
+    ~ReturningResponse() override
     {
         answer_.reset();
         ::malloc_trim(0);
     }
-    ReturningAnswer(const ReturningAnswer&) = delete;
-    ReturningAnswer& operator=(const ReturningAnswer&) = delete;
+    ReturningResponse(const ReturningResponse&) = delete;
+    ReturningResponse& operator=(const ReturningResponse&) = delete;
 
     bool append(std::string& out) override { return answer_->append(out); }
     std::size_t heldObjects() const noexcept override { return answer_->heldObjects(); }
 
 private:
-    std::unique_ptr<Answer> answer_;
+    std::unique_ptr<Response> answer_;
 };
 
 } // namespace
 
-std::unique_ptr<Answer> MemoryReturn::answer(
+std::unique_ptr<Response> MemoryReturn::answer(
     const Host::CimXml::Message& message, const Host::CimXml::Caller& caller)
 {
     const bool isLarge = message.size() >= largeMessage;
-    std::unique_ptr<Answer> answer;
+    std::unique_ptr<Response> answer;
     try {
         answer = handler_.answer(message, caller);
     } catch (...) {
@@ -56,7 +56,7 @@ std::unique_ptr<Answer> MemoryReturn::answer(
     }
     if (answer->heldObjects() < largeAnswer && !isLarge)
         return answer;
-    return std::make_unique<ReturningAnswer>(std::move(answer));
+    return std::make_unique<ReturningResponse>(std::move(answer));
 }
 
 } // namespace Tools

@@ -14,7 +14,7 @@ public:
     // The handler must outlive it.
     explicit MemoryReturn(Host::CimXml::OperationHandler& handler) : handler_(handler) {}
 
-    std::unique_ptr<Host::CimXml::Answer> answer(
+    std::unique_ptr<Host::CimXml::Response> answer(
         const Host::CimXml::Message& message, const Host::CimXml::Caller& caller) override;
 
 private:

@@ -7,7 +7,7 @@
 #include "host/broker/Broker.h"
 #include "host/broker/Refusal.h"
 #include "host/broker/Request.h"
-#include "host/cimxml/AnswerWriter.h"
+#include "host/cimxml/ResponseWriter.h"
 #include "host/cimxml/Message.h"
 #include "host/cimxml/RequestError.h"
 #include "tests/host/repository/MofTest.h"

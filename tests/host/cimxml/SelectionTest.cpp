@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-#include "host/cimxml/PropertySelection.h"
+#include "host/cimxml/ObjectSelection.h"
 
 #include "tests/host/cimxml/CimXmlTest.h"
 
@@ -9,7 +9,7 @@ namespace CimXmlTests {
 namespace {
 
 using Host::CimXml::isSelected;
-using Host::CimXml::PropertySelection;
+using Host::CimXml::ObjectSelection;
 
 class SelectionTest : public CimXmlTest {
 protected:
@@ -24,7 +24,7 @@ TEST_F(SelectionTest, withoutListAllPropertiesAreSelected)
 
 TEST_F(SelectionTest, listsAreReadInAnyLetterCase)
 {
-    PropertySelection selection;
+    ObjectSelection selection;
     selection.properties = {"PERCENT", "name"};
     EXPECT_TRUE(isSelected(selection, &gauge, "Percent"));
     EXPECT_TRUE(isSelected(selection, nullptr, "Name"));
@@ -35,7 +35,7 @@ TEST_F(SelectionTest, listsAreReadInAnyLetterCase)
 
 TEST_F(SelectionTest, localIsWhatTheClassDeclares)
 {
-    PropertySelection selection;
+    ObjectSelection selection;
     selection.localOnly = true;
     EXPECT_TRUE(isSelected(selection, &gauge, "percent"));
     EXPECT_TRUE(isSelected(selection, &gauge, "Label")); // overridden
@@ -48,7 +48,7 @@ TEST_F(SelectionTest, qualifiersAreSelectedOnRequest)
 {
     const auto& inherited = *findQualifier(gauge.qualifiers, "Description");
     ASSERT_TRUE(inherited.isPropagated);
-    PropertySelection selection;
+    ObjectSelection selection;
     EXPECT_FALSE(isSelected(selection, inherited));
     selection.includeQualifiers = true;
     EXPECT_TRUE(isSelected(selection, inherited));

@@ -37,14 +37,14 @@ using Testing::HttpReply;
 using Testing::lengthField;
 
 // So many pieces of so many bytes.
-class PiecewiseAnswer : public Host::CimXml::Answer {
+class PiecewiseResponse : public Host::CimXml::Response {
 public:
-    PiecewiseAnswer(std::string piece, std::size_t count, std::atomic<int>& alive)
+    PiecewiseResponse(std::string piece, std::size_t count, std::atomic<int>& alive)
         : piece_(std::move(piece)), left_(count), alive_(alive)
     {
         ++alive_;
     }
-    ~PiecewiseAnswer() override { --alive_; }
+    ~PiecewiseResponse() override { --alive_; }
 
     bool append(std::string& out) override
     {
@@ -68,7 +68,7 @@ class StubOperations : public Host::CimXml::OperationHandler {
 public:
     using Work = std::function<void(const Message&, const Caller&)>;
 
-    std::unique_ptr<Host::CimXml::Answer> answer(
+    std::unique_ptr<Host::CimXml::Response> answer(
         const Message& message, const Caller& caller) override
     {
         ++calls;
@@ -76,7 +76,7 @@ public:
         if (work)
             work(message, caller);
         ++finished;
-        return std::make_unique<PiecewiseAnswer>(text, repetitions, answersAlive);
+        return std::make_unique<PiecewiseResponse>(text, repetitions, answersAlive);
     }
 
     // What is done before the answer.

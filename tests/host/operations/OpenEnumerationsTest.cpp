@@ -14,9 +14,9 @@
 
 namespace {
 
-using Host::AnswerObjects;
 using Host::ClassName;
 using Host::EnumerationOwner;
+using Host::FoundObjects;
 using namespace std::chrono_literals;
 
 const EnumerationOwner Owner = {"somebody", "root/test", false};
@@ -34,10 +34,10 @@ std::string refusalOf(const std::function<void()>& operation)
 class OpenEnumerationsTest : public testing::Test {
 protected:
     // Class names stand for objects of all kinds.
-    static AnswerObjects objects(std::size_t count)
+    static FoundObjects objects(std::size_t count)
     {
         static const std::string digits = "0123456789";
-        AnswerObjects made;
+        FoundObjects made;
         for (std::size_t i = 0; i < count; ++i)
             made.add(ClassName{std::string_view(digits).substr(i % 10, 1)});
         return made;
@@ -178,7 +178,7 @@ TEST_F(OpenEnumerationsTest, memoryStaysWithWhatWasPulled)
 {
     auto memory = std::make_shared<Host::Arena>();
     const std::weak_ptr<Host::Arena> watched = memory;
-    AnswerObjects made(std::move(memory));
+    FoundObjects made(std::move(memory));
     for (int i = 0; i < 4; ++i)
         made.add(ClassName{"x"});
     const std::string context = enumerations_.open({Owner, std::move(made), {}, 10s});
@@ -193,7 +193,7 @@ TEST_F(OpenEnumerationsTest, memoryGoesWithTheTime)
 {
     auto memory = std::make_shared<Host::Arena>();
     const std::weak_ptr<Host::Arena> watched = memory;
-    AnswerObjects made(std::move(memory));
+    FoundObjects made(std::move(memory));
     made.add(ClassName{"x"});
     enumerations_.open({Owner, std::move(made), {}, 10s});
     now_ += 9s;
@@ -208,7 +208,7 @@ TEST(OpenEnumerationsThreads, eachObjectIsPulledOnce)
 {
     constexpr std::size_t count = 4000;
     Host::OpenEnumerations enumerations({.maximumOpenEnumerations = 1000});
-    AnswerObjects made;
+    FoundObjects made;
     for (std::size_t i = 0; i < count; ++i)
         made.add(ClassName{"x"});
     const std::string context = enumerations.open({Owner, std::move(made), {}, 60s});

@@ -19,10 +19,10 @@ namespace OperationTests {
 using CimXmlTests::classOf;
 using CimXmlTests::parameter;
 using CimXmlTests::valueOf;
-using Host::CimXml::Answer;
 using Host::CimXml::Caller;
 using Host::CimXml::Message;
 using Host::CimXml::OperationHandler;
+using Host::CimXml::Response;
 
 inline std::string callIn(
     const std::string& nameSpace, const std::string& operation, const std::string& parameters = {})
@@ -38,7 +38,7 @@ inline std::string callIn(
                                  parameters + "</IMETHODCALL></SIMPLEREQ>");
 }
 
-inline std::string textOf(Answer& answer)
+inline std::string textOf(Response& answer)
 {
     std::string text;
     while (answer.append(text)) {}

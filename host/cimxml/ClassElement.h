@@ -4,7 +4,7 @@
 
 #pragma once
 
-#include "host/cimxml/PropertySelection.h"
+#include "host/cimxml/ObjectSelection.h"
 #include "host/repository/ClassDeclaration.h"
 
 #include <string>
@@ -14,6 +14,6 @@ namespace Host::CimXml {
 // Appends CLASS with the selected properties in the order of the declaration. An inherited one is
 // marked PROPAGATED.
 void writeClass(
-    std::string& out, const ClassDeclaration& declared, const PropertySelection& selection);
+    std::string& out, const ClassDeclaration& declared, const ObjectSelection& selection);
 
 } // namespace Host::CimXml

@@ -27,30 +27,30 @@ struct ClassName {
 };
 
 // Classes, their names and qualifiers are the repository's.
-using AnswerObject = std::variant<const Instance*, const ObjectPath*, const ClassDeclaration*,
+using FoundObject = std::variant<const Instance*, const ObjectPath*, const ClassDeclaration*,
     ClassName, const QualifierDeclaration*, Value>;
 
 // A run of objects, and a share in the memory they live in. That is given back as a whole, when
 // the last run of it goes; it makes no difference on which thread.
-class AnswerObjects {
+class FoundObjects {
 public:
-    AnswerObjects() : AnswerObjects(nullptr) {}
+    FoundObjects() : FoundObjects(nullptr) {}
     // The arena may be null when no object lives in one.
-    explicit AnswerObjects(std::shared_ptr<const Arena> arena);
+    explicit FoundObjects(std::shared_ptr<const Arena> arena);
 
     // REQUIRES: nothing was taken yet.
-    void add(const AnswerObject& object);
+    void add(const FoundObject& object);
     // The instances of the result and its paths.
     void add(const CollectedResult& result);
 
     std::size_t size() const noexcept { return end_ - begin_; }
-    const AnswerObject& operator[](std::size_t position) const
+    const FoundObject& operator[](std::size_t position) const
     {
         return store_->objects[begin_ + position];
     }
 
     // The first ones, which are in here no more; fewer if there are not as many.
-    AnswerObjects takeFirst(std::size_t count);
+    FoundObjects takeFirst(std::size_t count);
 
     // How many objects the memory holds, with those that were taken.
     std::size_t heldObjects() const noexcept { return store_->objects.size(); }
@@ -58,7 +58,7 @@ public:
 private:
     struct Store {
         std::shared_ptr<const Arena> arena;
-        std::vector<AnswerObject> objects;
+        std::vector<FoundObject> objects;
     };
 
     std::shared_ptr<Store> store_;

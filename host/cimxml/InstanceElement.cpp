@@ -1,14 +1,14 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-#include "host/cimxml/InstanceWriter.h"
+#include "host/cimxml/InstanceElement.h"
 
 #include "host/broker/Array.h"
 #include "host/broker/String.h"
 #include "host/broker/Types.h"
 #include "host/cimxml/Literal.h"
 #include "host/cimxml/Markup.h"
-#include "host/cimxml/PathWriter.h"
-#include "host/cimxml/QualifierWriter.h"
+#include "host/cimxml/PathElement.h"
+#include "host/cimxml/QualifierElement.h"
 
 namespace Host::CimXml {
 
@@ -19,7 +19,7 @@ void writeOne(std::string& out, const Value& value)
     out += "<VALUE>";
     if (const Instance* const embedded = value.instance()) {
         std::string text;
-        InstanceWriter().write(text, *embedded, nullptr);
+        InstanceMarkup().write(text, *embedded, nullptr);
         appendEscaped(out, text);
     } else {
         appendLiteral(out, value);
@@ -27,9 +27,9 @@ void writeOne(std::string& out, const Value& value)
     out += "</VALUE>";
 }
 
-// The element without its value. Returns where that belongs.
+// Appends the property's element without its value. Returns where that belongs.
 std::size_t writeFrame(std::string& out, std::string_view name, CMPIType valueType,
-    const ClassDeclaration* declared, const PropertySelection& selection)
+    const ClassDeclaration* declared, const ObjectSelection& selection)
 {
     const PropertyDeclaration* const property =
         declared == nullptr ? nullptr : declared->property(name);
@@ -61,21 +61,18 @@ void writeValue(std::string& out, const Value& value)
 {
     if (value.isNull())
         return;
-    if (const ObjectPath* const reference = value.path()) {
+    if (const Array* const array = value.array()) {
+        const Markup element(out, array->type() == CMPI_ref ? "VALUE.REFARRAY" : "VALUE.ARRAY");
+        for (const Value& each : array->elements())
+            writeValue(out, each);
+    } else if (const ObjectPath* const reference = value.path()) {
         writeReference(out, *reference);
-        return;
-    }
-    const Array* const array = value.array();
-    if (array == nullptr) {
+    } else {
         writeOne(out, value);
-        return;
     }
-    const Markup element(out, array->type() == CMPI_ref ? "VALUE.REFARRAY" : "VALUE.ARRAY");
-    for (const Value& each : array->elements())
-        writeValue(out, each);
 }
 
-void InstanceWriter::write(
+void InstanceMarkup::write(
     std::string& out, const Instance& instance, const ClassDeclaration* declared)
 {
     if (declared != declared_)
@@ -97,7 +94,7 @@ void InstanceWriter::write(
 }
 
 // Instances of a class mostly have the same properties in the same order.
-const InstanceWriter::Frame& InstanceWriter::frameFor(std::string_view property, CMPIType valueType)
+const InstanceMarkup::Frame& InstanceMarkup::frameFor(std::string_view property, CMPIType valueType)
 {
     for (std::size_t tried = 0; tried < frames_.size(); ++tried) {
         const Frame& next = frames_[next_];
@@ -108,7 +105,7 @@ const InstanceWriter::Frame& InstanceWriter::frameFor(std::string_view property,
     return frames_.emplace_back(makeFrame(property, valueType));
 }
 
-InstanceWriter::Frame InstanceWriter::makeFrame(std::string_view name, CMPIType valueType) const
+InstanceMarkup::Frame InstanceMarkup::makeFrame(std::string_view name, CMPIType valueType) const
 {
     Frame frame{std::string(name), valueType, {}, 0};
     if (isSelected(selection_, declared_, name))

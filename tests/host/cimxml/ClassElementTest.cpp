@@ -2,19 +2,19 @@
 
 // Classes and qualifiers as they are written.
 
-#include "host/cimxml/ClassWriter.h"
-#include "host/cimxml/QualifierWriter.h"
+#include "host/cimxml/ClassElement.h"
+#include "host/cimxml/QualifierElement.h"
 #include "tests/host/cimxml/CimXmlTest.h"
 
 namespace CimXmlTests {
 
 namespace {
 
-using Host::CimXml::PropertySelection;
+using Host::CimXml::ObjectSelection;
 
-class ClassAnswerTest : public CimXmlTest {
+class ClassElementTest : public CimXmlTest {
 protected:
-    std::string written(const std::string& name, const PropertySelection& selection) const
+    std::string written(const std::string& name, const ObjectSelection& selection) const
     {
         std::string out;
         writeClass(out, Testing::classNamed(*repository, name), selection);
@@ -29,7 +29,7 @@ protected:
     }
 };
 
-TEST_F(ClassAnswerTest, writesWhatAClassDeclares)
+TEST_F(ClassElementTest, writesWhatAClassDeclares)
 {
     EXPECT_EQ(written("Thing", {}),
         R"(<CLASS NAME="Thing"><PROPERTY NAME="Name" TYPE="string"></PROPERTY>)"
@@ -41,9 +41,9 @@ TEST_F(ClassAnswerTest, writesWhatAClassDeclares)
         R"(<PROPERTY NAME="Reading" TYPE="real64"></PROPERTY></CLASS>)");
 }
 
-TEST_F(ClassAnswerTest, tellsOriginAndInheritance)
+TEST_F(ClassElementTest, tellsOriginAndInheritance)
 {
-    PropertySelection selection;
+    ObjectSelection selection;
     selection.includeClassOrigin = true;
     selection.properties = {"name", "label", "percent"};
     EXPECT_EQ(written("Gauge", selection),
@@ -53,9 +53,9 @@ TEST_F(ClassAnswerTest, tellsOriginAndInheritance)
         R"(</PROPERTY><PROPERTY NAME="Percent" TYPE="uint8" CLASSORIGIN="Gauge"></PROPERTY></CLASS>)");
 }
 
-TEST_F(ClassAnswerTest, writesQualifiersOnRequest)
+TEST_F(ClassElementTest, writesQualifiersOnRequest)
 {
-    PropertySelection selection;
+    ObjectSelection selection;
     selection.includeQualifiers = true;
     EXPECT_EQ(written("Link", selection),
         R"(<CLASS NAME="Link"><QUALIFIER NAME="Association" TYPE="boolean" OVERRIDABLE="false">)"
@@ -73,7 +73,7 @@ TEST_F(ClassAnswerTest, writesQualifiersOnRequest)
                             R"(TRANSLATABLE="true"><VALUE>A &lt;thing&gt;</VALUE></QUALIFIER>)"));
 }
 
-TEST_F(ClassAnswerTest, writesQualifierDeclarations)
+TEST_F(ClassElementTest, writesQualifierDeclarations)
 {
     EXPECT_EQ(qualifier("Key"),
         R"(<QUALIFIER.DECLARATION NAME="Key" TYPE="boolean" ISARRAY="false" OVERRIDABLE="false">)"

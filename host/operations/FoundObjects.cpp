@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-#include "host/operations/AnswerObjects.h"
+#include "host/operations/FoundObjects.h"
 
 #include "host/broker/CollectedResult.h"
 
@@ -9,29 +9,29 @@
 
 namespace Host {
 
-AnswerObjects::AnswerObjects(std::shared_ptr<const Arena> arena)
+FoundObjects::FoundObjects(std::shared_ptr<const Arena> arena)
     : store_(std::make_shared<Store>(Store{std::move(arena), {}}))
 {
 }
 
-void AnswerObjects::add(const AnswerObject& object)
+void FoundObjects::add(const FoundObject& object)
 {
     store_->objects.push_back(object);
     ++end_;
 }
 
-void AnswerObjects::add(const CollectedResult& result)
+void FoundObjects::add(const CollectedResult& result)
 {
     store_->objects.reserve(size() + result.instances().size() + result.paths().size());
     for (const Instance* const instance : result.instances())
-        add(AnswerObject(instance));
+        add(FoundObject(instance));
     for (const ObjectPath* const path : result.paths())
-        add(AnswerObject(path));
+        add(FoundObject(path));
 }
 
-AnswerObjects AnswerObjects::takeFirst(std::size_t count)
+FoundObjects FoundObjects::takeFirst(std::size_t count)
 {
-    AnswerObjects first = *this;
+    FoundObjects first = *this;
     first.end_ = begin_ += std::min(count, size());
     return first;
 }

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-#include "host/cimxml/PathWriter.h"
+#include "host/cimxml/PathElement.h"
 
 #include "host/broker/String.h"
 #include "host/cimxml/Literal.h"

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-#include "host/cimxml/QualifierWriter.h"
+#include "host/cimxml/QualifierElement.h"
 
 #include "host/broker/Types.h"
 #include "host/broker/Value.h"
@@ -86,7 +86,7 @@ void writeConstant(std::string& out, const Constant& value)
 }
 
 void writeQualifiers(
-    std::string& out, const QualifierList& qualifiers, const PropertySelection& selection)
+    std::string& out, const QualifierList& qualifiers, const ObjectSelection& selection)
 {
     for (const Qualifier& qualifier : qualifiers) {
         if (!isSelected(selection, qualifier))

@@ -2,7 +2,7 @@
 
 // Answers as they are read, piece by piece, after their request has ended.
 
-#include "host/operations/ObjectAnswer.h"
+#include "host/operations/ObjectResponse.h"
 #include "host/broker/Broker.h"
 #include "host/broker/Request.h"
 #include "tests/host/operations/ScriptedManager.h"
@@ -16,7 +16,7 @@ namespace {
 constexpr std::size_t portion = std::size_t{16} * 1024;
 constexpr std::size_t largestObject = 2048;
 
-TEST(ObjectAnswerTest, manyObjectsComeInSmallPieces)
+TEST(ObjectResponseTest, manyObjectsComeInSmallPieces)
 {
     ScriptedManager manager;
     manager.deliverThings(5000);
@@ -35,7 +35,7 @@ TEST(ObjectAnswerTest, manyObjectsComeInSmallPieces)
     EXPECT_FALSE(answer->append(whole));
 }
 
-TEST(ObjectAnswerTest, whatIsThereAlreadyStays)
+TEST(ObjectResponseTest, whatIsThereAlreadyStays)
 {
     ScriptedManager manager;
     manager.deliverThings(1);
@@ -49,9 +49,9 @@ TEST(ObjectAnswerTest, whatIsThereAlreadyStays)
     EXPECT_EQ(out, all);
 }
 
-TEST(ObjectAnswerTest, aFailureComesInOnePieceOnce)
+TEST(ObjectResponseTest, aFailureComesInOnePieceOnce)
 {
-    Host::WrittenAnswer answer("whole");
+    Host::WrittenResponse answer("whole");
     std::string out = "the ";
     EXPECT_TRUE(answer.append(out));
     EXPECT_EQ(out, "the whole");
@@ -59,11 +59,11 @@ TEST(ObjectAnswerTest, aFailureComesInOnePieceOnce)
     EXPECT_EQ(out, "the whole");
 }
 
-TEST(ObjectAnswerTest, anotherThreadMayReadIt)
+TEST(ObjectResponseTest, anotherThreadMayReadIt)
 {
     ScriptedManager manager;
     manager.deliverThings(1000);
-    std::unique_ptr<Answer> answer;
+    std::unique_ptr<Response> answer;
     std::thread([&] {
         answer = (*manager).answer(
             Message(call("EnumerateInstances", classOf("ClassName", "Thing"))), {});
@@ -76,7 +76,7 @@ TEST(ObjectAnswerTest, anotherThreadMayReadIt)
     EXPECT_EQ(countOf(text, "<VALUE.NAMEDINSTANCE>"), 1000U);
 }
 
-TEST(ObjectAnswerTest, itsObjectsGoWhenItWasReadOrWithIt)
+TEST(ObjectResponseTest, itsObjectsGoWhenItWasReadOrWithIt)
 {
     const auto classes = Testing::compile(CimXmlTests::Classes);
     const Host::Broker broker;
@@ -85,11 +85,11 @@ TEST(ObjectAnswerTest, itsObjectsGoWhenItWasReadOrWithIt)
     const auto make = [&] {
         const Host::Request request(broker);
         memory = request.shareArena();
-        Host::AnswerObjects objects(request.shareArena());
+        Host::FoundObjects objects(request.shareArena());
         objects.add(&request.makePath("root/test", "Thing"));
-        return std::make_unique<Host::ObjectAnswer>(message,
+        return std::make_unique<Host::ObjectResponse>(message,
             Host::CimXml::OperationKind::enumerateInstanceNames, *classes,
-            Host::CimXml::Location{"host", "root/test"}, Host::CimXml::PropertySelection{},
+            Host::CimXml::Location{"host", "root/test"}, Host::CimXml::ObjectSelection{},
             std::move(objects), std::nullopt);
     };
     auto read = make();

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-#include "host/cimxml/PropertySelection.h"
+#include "host/cimxml/ObjectSelection.h"
 
 #include "host/broker/Names.h"
 #include "host/repository/ClassDeclaration.h"
@@ -9,14 +9,14 @@
 
 namespace Host::CimXml {
 
-bool isListed(const PropertySelection& selection, std::string_view propertyName)
+bool isListed(const ObjectSelection& selection, std::string_view propertyName)
 {
     return !selection.properties ||
            std::any_of(selection.properties->begin(), selection.properties->end(),
                [&](const std::string& listed) { return equalNames(listed, propertyName); });
 }
 
-bool isSelected(const PropertySelection& selection, const ClassDeclaration* declared,
+bool isSelected(const ObjectSelection& selection, const ClassDeclaration* declared,
     std::string_view propertyName)
 {
     if (!isListed(selection, propertyName))
@@ -27,7 +27,7 @@ bool isSelected(const PropertySelection& selection, const ClassDeclaration* decl
     return property == nullptr || property->declaredIn == declared;
 }
 
-bool isSelected(const PropertySelection& selection, const Qualifier& qualifier)
+bool isSelected(const ObjectSelection& selection, const Qualifier& qualifier)
 {
     return selection.includeQualifiers && (!selection.localOnly || !qualifier.isPropagated);
 }

@@ -4,9 +4,9 @@
 
 #pragma once
 
-#include "host/cimxml/AnswerWriter.h"
 #include "host/cimxml/OperationHandler.h"
-#include "host/operations/AnswerObjects.h"
+#include "host/cimxml/ResponseWriter.h"
+#include "host/operations/FoundObjects.h"
 
 #include <cstddef>
 #include <optional>
@@ -21,31 +21,30 @@ struct Continuation {
 };
 
 // Written object by object when pieces are asked for. Broker and repository must outlive it.
-class ObjectAnswer : public CimXml::Answer {
+class ObjectResponse : public CimXml::Response {
 public:
-    ObjectAnswer(const CimXml::Message& message, CimXml::OperationKind kind,
-        const Repository& classes, CimXml::Location location, CimXml::PropertySelection selection,
-        AnswerObjects objects, std::optional<Continuation> continuation);
+    ObjectResponse(const CimXml::Message& message, CimXml::OperationKind kind,
+        const Repository& classes, CimXml::Location location, CimXml::ObjectSelection selection,
+        FoundObjects objects, std::optional<Continuation> continuation);
 
     bool append(std::string& out) override;
     // With those that earlier answers to pulls told, which are in the same memory.
     std::size_t heldObjects() const noexcept override { return objects_.heldObjects(); }
 
 private:
-    void finish();
+    void finish(std::string& out);
 
-    AnswerObjects objects_;
+    FoundObjects objects_;
     std::size_t next_ = 0;
     std::optional<Continuation> continuation_;
-    std::string* out_ = nullptr; // while pieces are appended
-    CimXml::AnswerWriter writer_;
+    CimXml::ResponseWriter writer_;
     bool isFinished_ = false;
 };
 
 // One that is written already, such as that of a failure.
-class WrittenAnswer : public CimXml::Answer {
+class WrittenResponse : public CimXml::Response {
 public:
-    explicit WrittenAnswer(std::string text) : text_(std::move(text)) {}
+    explicit WrittenResponse(std::string text) : text_(std::move(text)) {}
 
     bool append(std::string& out) override;
     std::size_t heldObjects() const noexcept override { return 0; }

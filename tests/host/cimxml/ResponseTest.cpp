@@ -1,10 +1,10 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Answers, piece by piece.
+// Responses and the objects in them.
 
 #include "host/broker/Array.h"
 #include "host/broker/Instance.h"
-#include "host/cimxml/InstanceWriter.h"
+#include "host/cimxml/InstanceElement.h"
 #include "tests/host/cimxml/CimXmlTest.h"
 
 #include <limits>
@@ -14,8 +14,9 @@ namespace CimXmlTests {
 namespace {
 
 using Host::Value;
-using Host::CimXml::AnswerWriter;
+using Host::CimXml::InstanceMarkup;
 using Host::CimXml::OperationKind;
+using Host::CimXml::ResponseWriter;
 using testing::HasSubstr;
 
 const std::string Head = R"(<?xml version="1.0" encoding="utf-8"?>)"
@@ -35,48 +36,45 @@ const std::string NameSpaceXml =
     R"(<NAMESPACE NAME="test"></NAMESPACE></LOCALNAMESPACEPATH></NAMESPACEPATH>)";
 const std::string PathXml = "<INSTANCEPATH>" + NameSpaceXml + NameXml + "</INSTANCEPATH>";
 
-class AnswerTest : public CimXmlTest {
+class ResponseTest : public CimXmlTest {
 protected:
-    AnswerWriter writer(const std::string& name, OperationKind kind)
+    // Returns the whole response, whose objects the function appends.
+    template <typename AppendObjects>
+    std::string response(
+        const std::string& name, OperationKind kind, const AppendObjects& appendObjects)
     {
-        pieces.clear();
-        return {Message(call(name)), kind, *repository, {"box", Testing::NameSpace}, {},
-            [this](std::string_view piece) { pieces.emplace_back(piece); }};
+        ResponseWriter writer(
+            Message(call(name)), kind, *repository, {"box", Testing::NameSpace}, {});
+        std::string out;
+        writer.begin(out);
+        appendObjects(writer, out);
+        return out;
     }
-    const std::string& answer()
+    // Returns what stands in the IRETURNVALUE.
+    template <typename AppendObject>
+    std::string result(OperationKind kind, const AppendObject& appendObject)
     {
-        whole.clear();
-        for (const std::string& piece : pieces)
-            whole += piece;
-        return whole;
-    }
-    // What stands in the IRETURNVALUE.
-    std::string result()
-    {
-        const std::string& all = answer();
+        const std::string all = response("X", kind, [&](ResponseWriter& writer, std::string& out) {
+            appendObject(writer, out);
+            writer.finish(out);
+        });
         const auto begin = all.find("<IRETURNVALUE>") + 14;
         return all.substr(begin, all.find("</IRETURNVALUE>") - begin);
     }
     std::string instanceBy(OperationKind kind)
     {
-        auto out = writer("X", kind);
-        out.instance(instance());
-        out.finish();
-        return result();
+        return result(kind,
+            [&](ResponseWriter& writer, std::string& out) { writer.instance(out, instance()); });
     }
     std::string pathBy(OperationKind kind)
     {
-        auto out = writer("X", kind);
-        out.path(path());
-        out.finish();
-        return result();
+        return result(
+            kind, [&](ResponseWriter& writer, std::string& out) { writer.path(out, path()); });
     }
     std::string classNameBy(OperationKind kind)
     {
-        auto out = writer("X", kind);
-        out.className("Thing");
-        out.finish();
-        return result();
+        return result(
+            kind, [](ResponseWriter& writer, std::string& out) { writer.className(out, "Thing"); });
     }
 
     Host::Instance& emptyInstance(const char* className = "Thing")
@@ -110,18 +108,15 @@ protected:
     }
     static std::string instanceXml(const Host::Instance& instance,
         const Host::ClassDeclaration* declared = nullptr,
-        const Host::CimXml::PropertySelection& selection = {})
+        const Host::CimXml::ObjectSelection& selection = {})
     {
         std::string out;
-        Host::CimXml::InstanceWriter(selection).write(out, instance, declared);
+        InstanceMarkup(selection).write(out, instance, declared);
         return out;
     }
-
-    std::vector<std::string> pieces;
-    std::string whole;
 };
 
-TEST_F(AnswerTest, wrapsInstancesAsTheOperationDoes)
+TEST_F(ResponseTest, wrapsInstancesAsTheOperationDoes)
 {
     EXPECT_EQ(instanceBy(OperationKind::getInstance), InstanceXml);
     EXPECT_EQ(instanceBy(OperationKind::enumerateInstances),
@@ -135,7 +130,7 @@ TEST_F(AnswerTest, wrapsInstancesAsTheOperationDoes)
             "<VALUE.INSTANCEWITHPATH>" + PathXml + InstanceXml + "</VALUE.INSTANCEWITHPATH>");
 }
 
-TEST_F(AnswerTest, writesAnInstanceTheSameWhateverWasWrittenBefore)
+TEST_F(ResponseTest, writesAnInstanceTheSameWhateverWasWrittenBefore)
 {
     const Host::ClassDeclaration* const thing = &Testing::classNamed(*repository, "Thing");
     const Host::ClassDeclaration* const gauge = &Testing::classNamed(*repository, "Gauge");
@@ -155,11 +150,11 @@ TEST_F(AnswerTest, writesAnInstanceTheSameWhateverWasWrittenBefore)
         instanceWith({{"name", text}, {"INDEX", Value()}}),
         instanceWith({{"Unknown", number}, {"Name", text}, {"Index", number}}),
     };
-    Host::CimXml::PropertySelection selection;
+    Host::CimXml::ObjectSelection selection;
     selection.localOnly = true;
     selection.includeQualifiers = true;
     selection.includeClassOrigin = true;
-    Host::CimXml::InstanceWriter writer(selection);
+    InstanceMarkup writer(selection);
     for (const Host::ClassDeclaration* const declared : {thing, gauge, thing, {}, gauge})
         for (const Host::Instance* const each : instances) {
             std::string out;
@@ -168,7 +163,7 @@ TEST_F(AnswerTest, writesAnInstanceTheSameWhateverWasWrittenBefore)
         }
 }
 
-TEST_F(AnswerTest, wrapsPathsAndClassNamesAsTheOperationDoes)
+TEST_F(ResponseTest, wrapsPathsAndClassNamesAsTheOperationDoes)
 {
     EXPECT_EQ(pathBy(OperationKind::enumerateInstanceNames), NameXml);
     EXPECT_EQ(pathBy(OperationKind::associatorNames), "<OBJECTPATH>" + PathXml + "</OBJECTPATH>");
@@ -180,111 +175,84 @@ TEST_F(AnswerTest, wrapsPathsAndClassNamesAsTheOperationDoes)
         "<OBJECTPATH><CLASSPATH>" + NameSpaceXml + name + "</CLASSPATH></OBJECTPATH>");
 }
 
-TEST_F(AnswerTest, writesClassesAndQualifiers)
+TEST_F(ResponseTest, WritesClassesAndQualifiers)
 {
-    auto out = writer("EnumerateClasses", OperationKind::enumerateClasses);
-    out.classDeclaration(Testing::classNamed(*repository, "Single"));
-    out.finish();
+    const auto single = [this](OperationKind kind) {
+        return result(kind, [this](ResponseWriter& writer, std::string& out) {
+            writer.classDeclaration(out, Testing::classNamed(*repository, "Single"));
+        });
+    };
     const std::string declared =
         R"(<CLASS NAME="Single"><PROPERTY NAME="InstanceID" TYPE="string"></PROPERTY></CLASS>)";
-    EXPECT_EQ(result(), declared);
-    auto associated = writer("Associators", OperationKind::associators);
-    associated.classDeclaration(Testing::classNamed(*repository, "Single"));
-    associated.finish();
-    EXPECT_EQ(result(), "<VALUE.OBJECTWITHPATH><CLASSPATH>" + NameSpaceXml +
-                            "<CLASSNAME NAME=\"Single\"></CLASSNAME></CLASSPATH>" + declared +
-                            "</VALUE.OBJECTWITHPATH>");
-    auto qualifiers = writer("GetQualifier", OperationKind::getQualifier);
-    qualifiers.qualifierDeclaration(*repository->findQualifier(Testing::NameSpace, "Key"));
-    qualifiers.finish();
-    EXPECT_THAT(result(), testing::StartsWith("<QUALIFIER.DECLARATION NAME=\"Key\""));
-}
-
-TEST_F(AnswerTest, goesOutInPieces)
-{
-    auto out = writer("EnumerateInstanceNames", OperationKind::enumerateInstanceNames);
-    EXPECT_FALSE(out.hasBegun());
-    out.path(path());
-    EXPECT_TRUE(out.hasBegun());
-    out.path(path());
-    out.finish();
-    EXPECT_THAT(
-        pieces, testing::ElementsAre(Head + "EnumerateInstanceNames\"><IRETURNVALUE>" + NameXml,
-                    NameXml, "</IRETURNVALUE>" + Tail));
-}
-
-TEST_F(AnswerTest, noPieceGrowsWithTheNumberOfObjects)
-{
-    std::size_t largest = 0;
-    std::size_t sum = 0;
-    AnswerWriter out(Message(call("EnumerateInstances")), OperationKind::enumerateInstances,
-        *repository, {"box", Testing::NameSpace}, {}, [&](std::string_view piece) {
-            largest = std::max(largest, piece.size());
-            sum += piece.size();
+    EXPECT_EQ(single(OperationKind::enumerateClasses), declared);
+    EXPECT_EQ(single(OperationKind::associators),
+        "<VALUE.OBJECTWITHPATH><CLASSPATH>" + NameSpaceXml +
+            "<CLASSNAME NAME=\"Single\"></CLASSNAME></CLASSPATH>" + declared +
+            "</VALUE.OBJECTWITHPATH>");
+    const std::string key =
+        result(OperationKind::getQualifier, [this](ResponseWriter& writer, std::string& out) {
+            writer.qualifierDeclaration(out, *repository->findQualifier(Testing::NameSpace, "Key"));
         });
-    const Host::Instance& each = instance();
-    for (int count = 0; count < 60'000; ++count)
-        out.instance(each);
-    out.finish();
-    EXPECT_GT(sum, 20'000'000U);
-    EXPECT_LT(largest, 1000U);
+    EXPECT_THAT(key, testing::StartsWith("<QUALIFIER.DECLARATION NAME=\"Key\""));
 }
 
-TEST_F(AnswerTest, emptyAnswersHaveNoObjectsOrNoReturnValue)
+TEST_F(ResponseTest, WithoutObjectsTheReturnValueIsEmptyOrLeftOut)
 {
-    auto none = writer("EnumerateInstances", OperationKind::enumerateInstances);
-    none.finish();
-    EXPECT_EQ(answer(), Head + "EnumerateInstances\"><IRETURNVALUE></IRETURNVALUE>" + Tail);
-    auto nothing = writer("CloseEnumeration", OperationKind::closeEnumeration);
-    nothing.finish();
-    EXPECT_EQ(answer(), Head + "CloseEnumeration\">" + Tail);
+    const auto empty = [this](const std::string& name, OperationKind kind) {
+        return response(
+            name, kind, [](ResponseWriter& writer, std::string& out) { writer.finish(out); });
+    };
+    EXPECT_EQ(empty("EnumerateInstances", OperationKind::enumerateInstances),
+        Head + "EnumerateInstances\"><IRETURNVALUE></IRETURNVALUE>" + Tail);
+    EXPECT_EQ(empty("CloseEnumeration", OperationKind::closeEnumeration),
+        Head + "CloseEnumeration\">" + Tail);
 }
 
-TEST_F(AnswerTest, saysWhetherASequenceGoesOn)
+TEST_F(ResponseTest, SaysWhetherAnEnumerationGoesOn)
 {
-    const auto end = [](const std::string& ended, const std::string& context) {
-        return R"(</IRETURNVALUE><PARAMVALUE NAME="EndOfSequence" PARAMTYPE="boolean"><VALUE>)" +
+    const auto pulled = [this](const std::optional<std::string>& context) {
+        return response("PullInstancePaths", OperationKind::pullInstancePaths,
+            [&](ResponseWriter& writer, std::string& out) { writer.finish(out, context); });
+    };
+    const auto expected = [](const std::string& ended, const std::string& context) {
+        return Head +
+               R"(PullInstancePaths"><IRETURNVALUE></IRETURNVALUE>)"
+               R"(<PARAMVALUE NAME="EndOfSequence" PARAMTYPE="boolean"><VALUE>)" +
                ended +
                R"(</VALUE></PARAMVALUE><PARAMVALUE NAME="EnumerationContext" PARAMTYPE="string">)" +
                "<VALUE>" + context + "</VALUE></PARAMVALUE>" + Tail;
     };
-    auto open = writer("OpenEnumerateInstances", OperationKind::openEnumerateInstances);
-    open.finish("c&1");
-    EXPECT_EQ(answer(), Head + "OpenEnumerateInstances\"><IRETURNVALUE>" + end("FALSE", "c&amp;1"));
-    auto last = writer("PullInstancePaths", OperationKind::pullInstancePaths);
-    last.finish(std::nullopt);
-    EXPECT_EQ(answer(), Head + "PullInstancePaths\"><IRETURNVALUE>" + end("TRUE", ""));
+    EXPECT_EQ(pulled("c&1"), expected("FALSE", "c&amp;1"));
+    EXPECT_EQ(pulled(std::nullopt), expected("TRUE", ""));
 }
 
-TEST_F(AnswerTest, tellsFailuresWithCodeAndText)
+TEST_F(ResponseTest, tellsFailuresWithCodeAndText)
 {
-    EXPECT_EQ(errorAnswer(Message(call("GetInstance")), CMPI_RC_ERR_NOT_FOUND, "no \"x\" <here>"),
+    EXPECT_EQ(errorResponse(Message(call("GetInstance")), CMPI_RC_ERR_NOT_FOUND, "no \"x\" <here>"),
         Head + R"(GetInstance"><ERROR CODE="6" DESCRIPTION="no &quot;x&quot; &lt;here&gt;">)" +
             "</ERROR>" + Tail);
 }
 
-TEST_F(AnswerTest, writesTheValueOfAProperty)
+TEST_F(ResponseTest, WritesTheValueOfAProperty)
 {
-    auto out = writer("GetProperty", OperationKind::getProperty);
-    out.value(Value::integer(CMPI_sint32, 5));
-    out.finish();
-    EXPECT_EQ(result(), "<VALUE>5</VALUE>");
-    auto none = writer("GetProperty", OperationKind::getProperty);
-    none.value(Value::null(CMPI_sint32));
-    none.finish();
-    EXPECT_EQ(result(), "");
+    const auto property = [this](const Value& value) {
+        return result(OperationKind::getProperty,
+            [&](ResponseWriter& writer, std::string& out) { writer.value(out, value); });
+    };
+    EXPECT_EQ(property(Value::integer(CMPI_sint32, 5)), "<VALUE>5</VALUE>");
+    EXPECT_EQ(property(Value::null(CMPI_sint32)), "");
 }
 
-TEST_F(AnswerTest, repeatsWhatTheRequestSaysEscaped)
+TEST_F(ResponseTest, repeatsWhatTheRequestSaysEscaped)
 {
     std::string body = call("Get&lt;Instance");
     body.replace(body.find("4711"), 4, "&quot;&amp;&#233;");
-    EXPECT_THAT(errorAnswer(Message(body), CMPI_RC_ERR_NOT_SUPPORTED, "x"),
+    EXPECT_THAT(errorResponse(Message(body), CMPI_RC_ERR_NOT_SUPPORTED, "x"),
         testing::AllOf(
             HasSubstr("ID=\"&quot;&amp;\xC3\xA9\""), HasSubstr("NAME=\"Get&lt;Instance\"")));
 }
 
-TEST_F(AnswerTest, writesValuesOfEveryType)
+TEST_F(ResponseTest, writesValuesOfEveryType)
 {
     EXPECT_EQ(valueXml(Value::boolean(true)), "<VALUE>TRUE</VALUE>");
     EXPECT_EQ(valueXml(Value::integer(CMPI_sint8, 0x80)), "<VALUE>-128</VALUE>");
@@ -299,7 +267,7 @@ TEST_F(AnswerTest, writesValuesOfEveryType)
     EXPECT_EQ(textXml(""), "<VALUE></VALUE>");
 }
 
-TEST_F(AnswerTest, writesTextThatEveryClientCanRead)
+TEST_F(ResponseTest, writesTextThatEveryClientCanRead)
 {
     EXPECT_EQ(textXml("<a b='c' d=\"e\">&\t\n"),
         "<VALUE>&lt;a b=&apos;c&apos; d=&quot;e&quot;&gt;&amp;\t\n</VALUE>");
@@ -310,7 +278,7 @@ TEST_F(AnswerTest, writesTextThatEveryClientCanRead)
     EXPECT_EQ(textXml("\xF0\x9F"), "<VALUE>\xEF\xBF\xBD\xEF\xBF\xBD</VALUE>");
 }
 
-TEST_F(AnswerTest, leavesNullsInArraysOut)
+TEST_F(ResponseTest, leavesNullsInArraysOut)
 {
     Host::Array& array = Host::Array::make(request.arena(), CMPI_uint8, 3);
     array.set(0, Value::integer(CMPI_uint8, 1));
@@ -322,13 +290,13 @@ TEST_F(AnswerTest, leavesNullsInArraysOut)
         R"(<VALUE>1</VALUE><VALUE>3</VALUE></VALUE.ARRAY></PROPERTY.ARRAY></INSTANCE>)");
 }
 
-TEST_F(AnswerTest, takesFromTheClassWhatAValueDoesNotSay)
+TEST_F(ResponseTest, takesFromTheClassWhatAValueDoesNotSay)
 {
     const auto& declared = Testing::classNamed(*repository, "Gauge");
     Host::Instance& made = emptyInstance("Gauge");
     made.setProperty("Levels", Value());
     made.setProperty("Percent", Value::null(CMPI_uint8));
-    Host::CimXml::PropertySelection selection;
+    Host::CimXml::ObjectSelection selection;
     EXPECT_EQ(instanceXml(made, &declared),
         R"(<INSTANCE CLASSNAME="Gauge"><PROPERTY.ARRAY NAME="Levels" TYPE="sint32">)"
         R"(</PROPERTY.ARRAY><PROPERTY NAME="Percent" TYPE="uint8"></PROPERTY></INSTANCE>)");
@@ -339,7 +307,7 @@ TEST_F(AnswerTest, takesFromTheClassWhatAValueDoesNotSay)
         R"(CLASSORIGIN="Thing" PROPAGATED="true"></PROPERTY.ARRAY></INSTANCE>)");
 }
 
-TEST_F(AnswerTest, writesReferencesWithWhatTheyKnow)
+TEST_F(ResponseTest, writesReferencesWithWhatTheyKnow)
 {
     Host::Instance& made = emptyInstance("Link");
     Host::ObjectPath& target = path();
@@ -358,7 +326,7 @@ TEST_F(AnswerTest, writesReferencesWithWhatTheyKnow)
     EXPECT_EQ(instanceXml(made, &declared), begin + NameXml + end);
 }
 
-TEST_F(AnswerTest, writesEmbeddedInstancesAsText)
+TEST_F(ResponseTest, writesEmbeddedInstancesAsText)
 {
     Host::Instance& inner = emptyInstance("Single");
     inner.setProperty("InstanceID", Value::text(request.arena(), "<"));

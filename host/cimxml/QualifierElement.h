@@ -6,7 +6,7 @@
 #pragma once
 
 #include "host/cimxml/Markup.h"
-#include "host/cimxml/PropertySelection.h"
+#include "host/cimxml/ObjectSelection.h"
 #include "host/repository/Qualifier.h"
 
 #include <string>
@@ -25,7 +25,7 @@ void writeConstant(std::string& out, const Constant& value);
 
 // A QUALIFIER for each that is selected. Flavors that are as usual are not written.
 void writeQualifiers(
-    std::string& out, const QualifierList& qualifiers, const PropertySelection& selection);
+    std::string& out, const QualifierList& qualifiers, const ObjectSelection& selection);
 
 // QUALIFIER.DECLARATION
 void writeQualifierDeclaration(std::string& out, const QualifierDeclaration& declared);

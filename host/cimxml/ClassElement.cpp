@@ -1,16 +1,16 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-#include "host/cimxml/ClassWriter.h"
+#include "host/cimxml/ClassElement.h"
 
 #include "host/cimxml/Literal.h"
-#include "host/cimxml/QualifierWriter.h"
+#include "host/cimxml/QualifierElement.h"
 
 namespace Host::CimXml {
 
 namespace {
 
 void writeProperty(std::string& out, const PropertyDeclaration& property,
-    const ClassDeclaration& declared, const PropertySelection& selection)
+    const ClassDeclaration& declared, const ObjectSelection& selection)
 {
     Markup element(out, elementNameFor(property.type));
     element.attribute("NAME", property.name);
@@ -31,7 +31,7 @@ void writeProperty(std::string& out, const PropertyDeclaration& property,
 } // namespace
 
 void writeClass(
-    std::string& out, const ClassDeclaration& declared, const PropertySelection& selection)
+    std::string& out, const ClassDeclaration& declared, const ObjectSelection& selection)
 {
     Markup element(out, "CLASS");
     element.attribute("NAME", declared.name);

@@ -1,0 +1,52 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#pragma once
+
+#include "host/broker/Instance.h"
+#include "host/cimxml/ObjectSelection.h"
+#include "host/repository/Repository.h"
+
+#include <cstddef>
+#include <string>
+#include <string_view>
+#include <utility>
+#include <vector>
+
+namespace Host::CimXml {
+
+// Appends VALUE, VALUE.ARRAY or VALUE.REFERENCE (DSP0201); nothing for a null. A null in an array
+// is left out, since not all clients know VALUE.NULL. An embedded instance is the text of its
+// INSTANCE.
+void writeValue(std::string& out, const Value& value);
+
+// Writes instances as INSTANCE with PROPERTY, PROPERTY.ARRAY or PROPERTY.REFERENCE for each
+// selected property that the instance has, in its order. What a value does not say, such as the
+// type of a null, comes from the class. Keeps the markup around the values, which is the same in
+// all instances of a class: that takes a third of the time of making it anew. Used by one thread at
+// a time.
+class InstanceMarkup {
+public:
+    explicit InstanceMarkup(ObjectSelection selection = {}) : selection_(std::move(selection)) {}
+
+    // The class is null where it is not known; else it must outlive the object.
+    void write(std::string& out, const Instance& instance, const ClassDeclaration* declared);
+
+private:
+    // The element of a property whose value is of that type, without the value.
+    struct Frame {
+        std::string property;
+        CMPIType valueType = CMPI_null;
+        std::string text; // empty when the property is not selected
+        std::size_t valueAt = 0;
+    };
+
+    const Frame& frameFor(std::string_view property, CMPIType valueType);
+    Frame makeFrame(std::string_view property, CMPIType valueType) const;
+
+    ObjectSelection selection_;
+    const ClassDeclaration* declared_ = nullptr;
+    std::vector<Frame> frames_; // of that class
+    std::size_t next_ = 0;      // where the search begins
+};
+
+} // namespace Host::CimXml
