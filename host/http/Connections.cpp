@@ -37,18 +37,11 @@ ClientConnection* Connections::add(
     int descriptor, const Address& client, std::shared_ptr<const Certificate> certificate)
 {
     const std::lock_guard lock(mutex_);
-    const std::string neighbourhood = client.neighbourhood();
-    if (!hasRoomFor(client, neighbourhood)) {
+    if (!hasRoomFor(client)) {
         ::shutdown(descriptor, SHUT_RDWR);
         return nullptr;
     }
     ClientConnection& connection = all_.emplace_back(descriptor, client, std::move(certificate));
-    try {
-        ++countByNeighbourhood_[neighbourhood];
-    } catch (...) {
-        all_.pop_back();
-        throw;
-    }
     // Bounds the handshake and the wait for the first request.
     connection.deadline = Clock::now() + timeoutOf(Phase::idle);
     if (isShuttingDown_)
@@ -58,12 +51,13 @@ ClientConnection* Connections::add(
     return &connection;
 }
 
-bool Connections::hasRoomFor(const Address& client, const std::string& neighbourhood)
+bool Connections::hasRoomFor(const Address& client)
 {
-    const auto found = countByNeighbourhood_.find(neighbourhood);
     const bool areTooMany = all_.size() >= limits_.maximumConnections;
-    if (!areTooMany && (found == countByNeighbourhood_.end() ||
-                           found->second < limits_.maximumConnectionsPerAddress))
+    const auto neighbours = std::count_if(all_.begin(), all_.end(),
+        [neighbourhood = client.neighbourhood()](
+            const ClientConnection& each) { return each.neighbourhood == neighbourhood; });
+    if (!areTooMany && static_cast<std::size_t>(neighbours) < limits_.maximumConnectionsPerAddress)
         return true;
     const auto now = Clock::now();
     if (!lastComplaint_ || now - *lastComplaint_ >= complaintInterval) {
@@ -82,9 +76,6 @@ void Connections::remove(ClientConnection& connection)
     std::list<ClientConnection> removed;
     enter(connection, Phase::idle);
     const std::lock_guard lock(mutex_);
-    const auto count = countByNeighbourhood_.find(connection.neighbourhood);
-    if (--count->second == 0)
-        countByNeighbourhood_.erase(count);
     const auto place = std::find_if(all_.begin(), all_.end(),
         [&](const ClientConnection& each) { return &each == &connection; });
     removed.splice(removed.end(), all_, place);

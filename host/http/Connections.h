@@ -11,7 +11,6 @@
 #include <condition_variable>
 #include <cstddef>
 #include <list>
-#include <map>
 #include <memory>
 #include <mutex>
 #include <optional>
@@ -23,12 +22,12 @@ namespace Host::Http {
 
 enum class Phase {
     idle,      // between requests
-    receiving, // a request comes in
-    working,   // it is carried out; the client cannot be late
+    receiving, // a request arrives
+    working,   // the server works on it: no timeout counts
     answering, // the client fetches the answer
 };
 
-// A client that is connected, from then to the end. Belongs to Connections.
+// An open connection. Connections owns it.
 struct ClientConnection {
     ClientConnection(
         int socket, const Address& client, std::shared_ptr<const Certificate> shownCertificate)
@@ -39,15 +38,15 @@ struct ClientConnection {
 
     const int descriptor;
     const std::string address;                            // for the log
-    const std::string neighbourhood;                      // for what one address may take
+    const std::string neighbourhood;                      // for the limits of an address
     const std::shared_ptr<const Certificate> certificate; // null without TLS
 
-    // Of Connections, which guards them.
+    // Guarded by the mutex of Connections.
     Phase phase = Phase::idle;
     std::chrono::steady_clock::time_point deadline{};
 
-    // Of the thread that serves the connection.
-    std::string target; // of the request that comes in
+    // Used by the connection's thread only.
+    std::string target; // of the request that arrives
     std::optional<Exchange> exchange;
 };
 
@@ -88,14 +87,13 @@ private:
     // REQUIRES: the mutex is held.
     void closeOverdue();
     std::chrono::seconds timeoutOf(Phase phase) const;
-    bool hasRoomFor(const Address& client, const std::string& neighbourhood);
+    bool hasRoomFor(const Address& client);
 
     const Limits& limits_;
     mutable std::mutex mutex_;
     // A first connection, the end of the last request in progress, the beginning of the shutdown.
     std::condition_variable_any changed_;
     std::list<ClientConnection> all_;
-    std::map<std::string, std::size_t> countByNeighbourhood_;
     std::size_t busy_ = 0; // connections that are not idle
     bool isShuttingDown_ = false;
     std::optional<Clock::time_point> lastComplaint_;

@@ -148,11 +148,4 @@ TEST_F(ServeOptionsTest, ValuesBeyondTheBoundsAreRefusedNamingThem)
         }
 }
 
-TEST_F(ServeOptionsTest, PortsAreBounded)
-{
-    for (const std::string name : {"port", "tls-port"})
-        for (const std::string value : {"65536", "-1", "http"})
-            EXPECT_THROW(typed({"--" + name, value}), CLI::ValidationError) << value;
-}
-
 } // namespace ServeOptionsTests

@@ -154,17 +154,6 @@ TEST_F(ServeProcessTest, ReaderOfTheGreetingMayLeave)
     EXPECT_EQ(server.end(SIGTERM).code, 0);
 }
 
-TEST_F(ServeProcessTest, EncryptedClientsThatLeaveInTheMiddleEndNothing)
-{
-    const ServerProcess server(encrypted("one"));
-    for (int i = 0; i < 20; ++i) {
-        TlsClient client(server.port("https"));
-        client.send(request());
-        client.closeHard();
-    }
-    EXPECT_EQ(sensorsIn(ask(HttpClient(server.port())).body), 5U);
-}
-
 TEST_F(ServeProcessTest, ServiceManagerIsToldWhatItDoes)
 {
     const ServiceManager manager(folder_.path() / "notify");

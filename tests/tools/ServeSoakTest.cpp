@@ -1,13 +1,14 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Clients that keep asking a server of its own process while a chip of the machine comes and goes:
-// every answer is whole and without error, and nothing stays behind in the server.
+// Clients of all kinds that keep asking a server of its own process while a chip of the machine
+// comes and goes: every answer is whole and without error, and nothing stays behind in the server.
 // SENSOR_PROFILE_SOAK_SECONDS says for how long.
 
 #include "platform/utilities/ProviderUtilities.h"
 #include "tests/support/CimCall.h"
 #include "tests/support/HttpClient.h"
 #include "tests/support/MountNamespace.h"
+#include "tests/support/TlsClient.h"
 #include "tests/tools/ServerProcess.h"
 #include "tests/tools/ToolTest.h"
 
@@ -106,16 +107,18 @@ protected:
         EXPECT_NE(::nice(10), -1);
         sysfs_ = std::make_unique<BoundSysfs>("hotplug");
         // Else the address sanitizer keeps what was freed, up to 256 MB.
-        server_ = std::make_unique<ServerProcess>(std::vector<std::string>{"--workers", "4"},
+        const std::string file = (folder_.path() / "one").string();
+        makeCertificate(file, "localhost");
+        server_ = std::make_unique<ServerProcess>(
+            std::vector<std::string>{"--certificate", file + ".crt", "--key", file + ".key"},
             std::map<std::string, std::string>{
                 {"ASAN_OPTIONS", "quarantine_size_mb=1:thread_local_quarantine_size_kb=64"},
                 {"RYNLOG_LOG", "off"}});
     }
 
     // A connection asks some times, as one that stays for ever would hide a leak in each.
-    void askAll(const std::string& request, int least, int most)
+    void askAll(HttpClient&& client, const std::string& request, int least, int most)
     {
-        HttpClient client(server_->port());
         for (int i = 0; i < 10; ++i) {
             client.send(request);
             const HttpReply reply = client.receive();
@@ -127,24 +130,39 @@ protected:
         }
     }
 
+    // Ends a connection in the middle of the answer, another one in the middle of the request.
+    void breakOff()
+    {
+        HttpClient reading(server_->port());
+        reading.send(allSensors);
+        reading.receiveSome();
+        reading.closeHard();
+        HttpClient writing(server_->port());
+        writing.send("POST /elsewhere HTTP/1.1\r\nHost: localhost\r\nContent-Length: 0\r\n\r\n");
+        EXPECT_EQ(writing.receive().status, 404);
+        writing.send(allSensors.substr(0, 150));
+    }
+
     void soak(Clock::duration time)
     {
         const auto end = Clock::now() + time;
         std::vector<std::thread> clients;
-        const auto keep = [&](const std::string& request, int least, int most) {
-            clients.emplace_back([this, end, request, least, most] {
+        const auto keep = [&](std::function<void()> asking) {
+            clients.emplace_back([end, asking = std::move(asking)] {
                 try {
                     while (Clock::now() < end && !HasFailure())
-                        askAll(request, least, most);
+                        asking();
                 } catch (const std::exception& error) {
                     ADD_FAILURE() << error.what();
                 }
             });
         };
-        keep(allSensors, 2, 3);
-        keep(allSensors, 2, 3);
-        keep(devicesOfTheSystem(), 2, 3);
-        keep(oneSensor(), 1, 1);
+        const auto connect = [this] { return HttpClient(server_->port()); };
+        keep([&] { askAll(connect(), allSensors, 2, 3); });
+        keep([&] { askAll(TlsClient(server_->port("https")), allSensors, 2, 3); });
+        keep([&] { askAll(connect(), devicesOfTheSystem(), 2, 3); });
+        keep([&] { askAll(connect(), oneSensor(), 1, 1); });
+        keep([this] { breakOff(); });
         while (Clock::now() < end) {
             sysfs_->rename("hwmon/hwmon2", "gone");
             std::this_thread::sleep_for(30ms);
@@ -179,6 +197,7 @@ protected:
         return true;
     }
 
+    TemporaryFolder folder_;
     std::unique_ptr<BoundSysfs> sysfs_;
     std::unique_ptr<ServerProcess> server_;
     Seen seen_;

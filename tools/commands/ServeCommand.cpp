@@ -54,7 +54,7 @@ constexpr const char* serveFooter =
     "The log goes to standard error, or where RYNLOG_LOG says: syslog, file:PATH or\n"
     "off. The server does not start where it cannot be written.";
 
-// The libraries of the providers have a log of their own, which follows the environment.
+// Sets the environment, since the libraries of the providers have logs of their own.
 void logToStandardError()
 {
     const char* const wanted = ::getenv("RYNLOG_LOG");
@@ -82,7 +82,8 @@ void requireReadable(const std::string& file)
             : file);
 }
 
-// Of the machine that is served, be they given by an option or by the environment.
+// Returns the model files of the machine that is served, from the environment, which the options
+// have set.
 std::vector<std::string> modelFiles()
 {
     std::vector<std::string> files;
@@ -95,15 +96,15 @@ std::vector<std::string> modelFiles()
     return files;
 }
 
-// A server whose log is lost from the beginning is nothing to rely on. One that loses it later
-// goes on.
+// Writes the first line of the log. Throws std::runtime_error when the log does not take it: a
+// server does not start without a log. One that loses it later continues.
 void beginLog(const std::string& text, Output& out)
 {
     report({"beginLog", "ServeCommand", __LINE__}, text);
     const std::string problem = Host::Http::logProblem();
     if (problem.empty())
         return;
-    // Where standard error is the log, it takes no complaint either.
+    // Where standard error is the log, it takes no error message either.
     if (::getenv("RYNLOG_LOG") == std::string("stderr")) {
         out.write("sensorctl: " + problem + "\n");
         out.flush();
@@ -121,7 +122,8 @@ void keepFreedMemory(std::size_t workers)
     ::mallopt(M_TRIM_THRESHOLD, 8 << 20);
 }
 
-// Until a signal says to end. False when requests are still running then.
+// Serves until a signal ends it. Returns false when requests still run at the end of the grace
+// period.
 bool serve(Host::Http::Server& server, const Protection& protection, const Signals& signals,
     std::chrono::seconds gracePeriod)
 {
@@ -186,7 +188,7 @@ public:
         if (serve(server, protection, signals, options_.gracePeriod))
             return ExitCode::success;
         complain("requests were still running at the end of the grace period");
-        // Waiting for them is what nobody wants.
+        // The destructor of the server would wait for them.
         ::_exit(static_cast<int>(ExitCode::failure));
     }
 

@@ -21,7 +21,7 @@ namespace {
 
 using Text::trimmed;
 
-// Of the command line alone.
+// These options exist on the command line only.
 constexpr std::string_view nameOfFileOption = "config";
 constexpr std::string_view nameOfHelpOption = "help";
 
@@ -29,7 +29,7 @@ class Reader {
 public:
     explicit Reader(CLI::App& parser) : parser_(parser) {}
 
-    // Throws UsageError with the reason alone.
+    // Throws UsageError with the reason.
     void take(std::string_view line)
     {
         const std::size_t equals = line.find('=');
@@ -73,7 +73,7 @@ private:
     }
 
     CLI::App& parser_;
-    std::map<const CLI::Option*, bool> seen_; // whether it was typed
+    std::map<const CLI::Option*, bool> seen_; // whether the command line set it
 };
 
 } // namespace

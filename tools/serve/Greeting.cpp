@@ -11,7 +11,7 @@ namespace {
 std::string urlOf(const Host::Http::ListeningSocket& socket, const std::string& account = {})
 {
     std::string place = socket.address().text();
-    // Whoever tries it here need not know the machine's name.
+    // An unspecified address is no destination.
     if (socket.address().isAny())
         place = "localhost:" + std::to_string(socket.address().port());
     return (socket.isEncrypted() ? "https://" : "http://") + account + place;

@@ -9,7 +9,7 @@
 
 namespace Tools {
 
-// Where clients find the server, and a command to try. The port of a socket is the actual one.
+// Returns what the server prints when it is ready: its addresses, and a command to try.
 std::string greeting(const std::vector<Host::Http::ListeningSocket>& sockets, bool isSignInNeeded);
 
 } // namespace Tools

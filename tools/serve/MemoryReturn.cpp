@@ -14,12 +14,11 @@ namespace {
 
 using Host::CimXml::Response;
 
-// Forty megabytes. To map them again takes a small part of the time that an answer of so many
-// takes.
+// The objects of an answer of this size take forty megabytes. Mapping them again takes a small part
+// of the time that the answer takes.
 constexpr std::size_t largeAnswer = 10'000;
 
-// In bytes; clients' own messages have a few hundred. The tree of elements and what is read of it
-// take ten times as much and more.
+// In bytes; usual messages have a few hundred. The parsed message takes ten times as much and more.
 constexpr std::size_t largeMessage = std::size_t{64} << 10;
 
 class ReturningResponse : public Response {

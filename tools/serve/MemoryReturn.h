@@ -6,9 +6,9 @@
 
 namespace Tools {
 
-// Gives back to the system what is free when the answer of very many objects, or to a very large
-// message, is dropped: the memory that each worker freed for itself would stay, and add up until
-// all of them had such an operation.
+// Passes operations to a handler, and returns free memory to the system when an answer with very
+// many objects, or to a very large message, is destroyed. Otherwise the arena of every thread would
+// keep what its largest operation freed.
 class MemoryReturn : public Host::CimXml::OperationHandler {
 public:
     // The handler must outlive it.

@@ -1,7 +1,5 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// What the command line and the configuration file can say about serving.
-
 #pragma once
 
 #include "host/http/Limits.h"
@@ -18,6 +16,7 @@ class App;
 
 namespace Tools {
 
+// The options of `sensorctl serve`, with their defaults.
 struct ServeOptions {
     Host::Http::ListenWishes listen;
     std::optional<std::string> certificate;
@@ -29,12 +28,12 @@ struct ServeOptions {
     Host::OperationLimits operations;
     std::chrono::seconds gracePeriod{20};
 
-    // The object must outlive the parser.
+    // Adds the options to a parser, which this object must outlive.
     void addTo(CLI::App& parser);
 
-    // To be called when the command line was read: reads the configuration file where there is
-    // one. Throws UsageError for a mistake in it and for options that do not go together, and
-    // std::runtime_error when it cannot be read.
+    // Reads the configuration file, if there is one. Throws UsageError for a mistake in it and for
+    // options that contradict each other, and std::runtime_error when it cannot be read.
+    // REQUIRES: the parser has parsed the command line.
     void complete(CLI::App& parser);
 };
 

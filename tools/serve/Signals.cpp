@@ -14,7 +14,6 @@ Signals::Signals()
     for (const int number : {SIGTERM, SIGINT, SIGHUP})
         ::sigaddset(&signals_, number);
     ::pthread_sigmask(SIG_BLOCK, &signals_, &before_);
-    // What cannot be written is an error of the write.
     struct sigaction ignoring {};
     ignoring.sa_handler = SIG_IGN;
     ::sigaction(SIGPIPE, &ignoring, &pipeBefore_);
@@ -37,11 +36,11 @@ int Signals::wait() const
     }
 }
 
-std::optional<int> Signals::waitFor(std::chrono::milliseconds time) const
+std::optional<int> Signals::waitFor(std::chrono::milliseconds timeout) const
 {
-    const auto whole = std::chrono::duration_cast<std::chrono::seconds>(time);
-    const timespec patience{whole.count(), std::chrono::nanoseconds(time - whole).count()};
-    const int number = ::sigtimedwait(&signals_, nullptr, &patience);
+    const auto whole = std::chrono::duration_cast<std::chrono::seconds>(timeout);
+    const timespec limit{whole.count(), std::chrono::nanoseconds(timeout - whole).count()};
+    const int number = ::sigtimedwait(&signals_, nullptr, &limit);
     return number > 0 ? std::optional(number) : std::nullopt;
 }
 

@@ -8,9 +8,9 @@
 
 namespace Tools {
 
-// While it lives, SIGTERM, SIGINT and SIGHUP reach nobody but who asks here, and neither a reader
-// that is gone nor a file that is too large ends the process. To be made before there are other
-// threads, which inherit that.
+// Blocks SIGTERM, SIGINT and SIGHUP while it exists, so that they are received here only, and
+// ignores SIGPIPE and SIGXFSZ, so that writing to a closed pipe or beyond a file's limit returns an
+// error. REQUIRES: there are no other threads; those that start later inherit the mask.
 class Signals {
 public:
     Signals();
@@ -18,10 +18,10 @@ public:
     Signals(const Signals&) = delete;
     Signals& operator=(const Signals&) = delete;
 
-    // The next signal's number.
+    // Blocks until a signal arrives. Returns its number.
     int wait() const;
-    // Nothing when none comes within the time.
-    std::optional<int> waitFor(std::chrono::milliseconds time) const;
+    // Does the same for at most the timeout. Returns nothing where no signal arrives.
+    std::optional<int> waitFor(std::chrono::milliseconds timeout) const;
 
 private:
     sigset_t signals_{};
@@ -30,7 +30,7 @@ private:
     struct sigaction fileBefore_ {};
 };
 
-// Ends the process as the signal does where nobody handles it.
+// Ends the process by the signal's default action.
 [[noreturn]] void endBySignal(int number);
 
 } // namespace Tools

@@ -1,15 +1,17 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// What is counted of clients, without clients.
+// The bounds that connections share, without sockets.
 
 #include "host/http/Connections.h"
 #include "host/http/UnsentObjects.h"
+#include "host/http/WorkSlots.h"
 
 #include <gtest/gtest.h>
 
+#include <atomic>
 #include <mutex>
-#include <sys/socket.h>
-#include <unistd.h>
+#include <thread>
+#include <vector>
 
 namespace HttpTests {
 
@@ -40,22 +42,6 @@ TEST(ConnectionsTest, AreNotTooManyHoweverManyAddThem)
     EXPECT_NE(connections.add(-1, client, nullptr), nullptr);
 }
 
-TEST(ConnectionsTest, OneTooManyAtAnAddressEnds)
-{
-    Host::Http::Limits limits;
-    limits.maximumConnectionsPerAddress = 1;
-    Host::Http::Connections connections(limits);
-    int ends[2];
-    ASSERT_EQ(::socketpair(AF_UNIX, SOCK_STREAM, 0, ends), 0);
-    EXPECT_NE(connections.add(-1, {"127.0.0.1", 1}, nullptr), nullptr);
-    EXPECT_NE(connections.add(-1, {"127.0.0.2", 1}, nullptr), nullptr);
-    EXPECT_EQ(connections.add(ends[0], {"127.0.0.1", 2}, nullptr), nullptr);
-    char byte = 0;
-    EXPECT_EQ(::recv(ends[1], &byte, 1, MSG_DONTWAIT), 0);
-    for (const int end : ends)
-        ::close(end);
-}
-
 TEST(UnsentObjectsTest, AreBoundedButForOneAnswerThatIsAlone)
 {
     Host::Http::UnsentObjects unsent(10);
@@ -72,6 +58,25 @@ TEST(UnsentObjectsTest, AreBoundedButForOneAnswerThatIsAlone)
     other.reset();
     EXPECT_EQ(unsent.hold(7), nullptr);
     EXPECT_NE(unsent.hold(6), nullptr);
+}
+
+TEST(WorkSlotsTest, ServeThoseWhoWaitAndRefuseMore)
+{
+    Host::Http::WorkSlots slots(1, 2);
+    auto first = slots.take();
+    std::atomic<int> served = 0;
+    std::atomic<int> refused = 0;
+    std::vector<std::jthread> others;
+    for (int i = 0; i < 3; ++i)
+        others.emplace_back([&] { ++(slots.take() ? served : refused); });
+    while (refused == 0)
+        std::this_thread::yield();
+    EXPECT_EQ(served, 0);
+    first.reset();
+    others.clear();
+    EXPECT_EQ(served, 2);
+    EXPECT_EQ(refused, 1);
+    EXPECT_NE(slots.take(), nullptr);
 }
 
 } // namespace

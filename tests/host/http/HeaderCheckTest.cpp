@@ -166,27 +166,6 @@ TEST(HeaderCheckTest, MustNameTheHostSinceHttpOneOne)
     EXPECT_EQ(verdict(with({"Host", ""})), "ok");
 }
 
-TEST(HeaderCheckTest, WhatLeavesTheEndUnclearEndsTheConnection)
-{
-    const auto ends = [](const Fields& fields, const std::string& version = "HTTP/1.1") {
-        try {
-            check({"POST", "/cimom", version, fields});
-            return false;
-        } catch (const HttpError& error) {
-            return error.endsConnection();
-        }
-    };
-    Fields twoLengths = usual;
-    twoLengths.push_back({"Content-Length", "10"});
-    EXPECT_TRUE(ends(twoLengths));
-    EXPECT_TRUE(ends(with({"Content-Length ", "11"})));
-    EXPECT_TRUE(ends(with({"Content-Length", "1 1"})));
-    EXPECT_TRUE(ends(with({"Transfer-Encoding", "chunked"})));
-    EXPECT_TRUE(
-        ends(with({"Transfer-Encoding", "chunked"}, without("Content-Length")), "HTTP/1.0"));
-    EXPECT_FALSE(ends(with({"Content-Type", "text/plain"})));
-}
-
 TEST(HeaderCheckTest, MustBeACallOfAKnownProtocolVersion)
 {
     EXPECT_EQ(verdict(without("CIMOperation")), "400 unsupported-operation");
@@ -232,14 +211,6 @@ TEST(HeaderCheckTest, MethodAndNamespaceMustBeThoseOfTheBody)
     for (const std::string object :
         {"root", "", "//host", "root/cimv2/x", "root%2", "root%", "root%zzcimv2", "%00", "%ff"})
         EXPECT_EQ(mismatch(with({"CIMObject", object})), "header-mismatch") << object;
-}
-
-TEST(HeaderCheckTest, AnswersToMandatoryPostsHaveFieldsOfTheirOwn)
-{
-    CallHead head;
-    EXPECT_EQ(answerFieldsFor(head).back().name, "CIMOperation");
-    head.extension = "07";
-    EXPECT_EQ(answerFieldsFor(head).back().name, "07-CIMOperation");
 }
 
 } // namespace

@@ -2,13 +2,9 @@
 
 // How the server ends.
 
-#include "host/http/WorkSlots.h"
 #include "tests/host/http/HttpTest.h"
-#include "tests/support/LogCapture.h"
 
-#include <condition_variable>
 #include <fcntl.h>
-#include <future>
 
 namespace HttpTests {
 
@@ -130,25 +126,6 @@ TEST_F(StopTest, PortIsFreeForTheNextServer)
         EXPECT_EQ(ask(post()).status, 200);
         server.reset();
     }
-}
-
-TEST(WorkSlotsTest, ServeThoseWhoWaitAndRefuseMore)
-{
-    Host::Http::WorkSlots slots(1, 2);
-    auto first = slots.take();
-    std::atomic<int> served = 0;
-    std::atomic<int> refused = 0;
-    std::vector<std::jthread> others;
-    for (int i = 0; i < 3; ++i)
-        others.emplace_back([&] { ++(slots.take() ? served : refused); });
-    while (refused == 0)
-        std::this_thread::yield();
-    EXPECT_EQ(served, 0);
-    first.reset();
-    others.clear();
-    EXPECT_EQ(served, 2);
-    EXPECT_EQ(refused, 1);
-    EXPECT_NE(slots.take(), nullptr);
 }
 
 } // namespace
