@@ -271,10 +271,12 @@ TEST_F(SensorProviderFaultTest, theStatusThatTheBrokerLeftIsReturned)
 
 TEST_F(SensorProviderFaultTest, aLabelThatCannotBeMadeIsAnEmptyElement)
 {
+    const char* properties[] = {"PossibleStates", nullptr};
     for (const auto& [manner, code] : std::initializer_list<std::pair<FaultManner, CMPIrc>>{
              {FaultManner::nullResult, CMPI_RC_OK}, {FaultManner::handleless, CMPI_RC_OK},
              {FaultManner::errorStatus, CMPI_RC_ERR_FAILED}}) {
-        const auto request = run(Operation::oneInstance, {BrokerCall::newString, 2, manner, code});
+        const auto request =
+            run(Operation::oneInstance, {BrokerCall::newString, 2, manner, code}, properties);
         ASSERT_EQ(request->answer.instances().size(), 1U);
         const Host::Array& states =
             *request->answer.instances()[0]->property("PossibleStates")->array();
@@ -282,6 +284,7 @@ TEST_F(SensorProviderFaultTest, aLabelThatCannotBeMadeIsAnEmptyElement)
         EXPECT_EQ(describe(states.elements()[0]), "string \"Normal\"");
         EXPECT_TRUE(states.elements()[1].isNull());
         EXPECT_EQ(describe(states.elements()[2]), "string \"Non-Critical\"");
+        EXPECT_EQ(faulty_->count(BrokerCall::setElementAt), 11U);
     }
 }
 
