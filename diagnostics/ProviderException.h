@@ -7,7 +7,7 @@
 
 namespace Vorn {
 
-// Raised when a harvested value cannot be stored in a record; what() names the value.
+// Reports that a record refused a harvested value; what() names the value.
 class ProviderException : public std::exception {
 public:
     // Copies the text. REQUIRES: message is not null.
@@ -15,7 +15,7 @@ public:
     ProviderException(const ProviderException&) = default;
     ~ProviderException() override = default;
 
-    // Valid as long as this object lives.
+    // Returns the message, which is valid as long as this object lives.
     const char* what() const noexcept override { return message_.c_str(); }
 
 private:

@@ -1,10 +1,9 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Trace lines: their formats, the marks that bracket every request, and the one place from
-// which a trace point reaches the log and the trace channel.
+// Trace lines: their formats, the marks around every request, and the function that writes a trace
+// point to the log channel and the trace channel.
 //
-// Every function here may be called from any thread; a line is formatted in buffers of its
-// thread's own.
+// Every function may be called from any thread; each thread formats lines in its own buffers.
 
 #pragma once
 
@@ -18,13 +17,13 @@
 
 namespace Vorn {
 
-// Selects the format of a trace line; any value but the last three formats as Entering.
+// Selects the format of a trace line; a value other than the last three formats as Entering.
 enum MessageType : int { Entering = 0, Exiting = 1, Method = 2, Message = 3 };
 
-// Importance of trace lines, as the logging library's filter takes it.
+// The levels of trace lines, by which the logging library filters them.
 enum TraceLevel : int { markWithParametersLevel = 3000, markLevel = 4000, failureLevel = 6000 };
 
-// A line is cut to one character less than this.
+// A line is truncated to one character less.
 inline constexpr std::size_t traceBufferSize = 512;
 using TraceBuffer = std::array<char, traceBufferSize>;
 
@@ -67,7 +66,7 @@ inline char* trace(const char* text, const char* file, unsigned line, MessageTyp
     return detail::format(buffer, text, file, line, "", "", type);
 }
 
-// The same with a parameter list, in a buffer of its own.
+// Formats a line with a parameter list into a second buffer of the thread.
 inline char* tracepara(
     const char* text, const char* file, unsigned line, const char* parameters, MessageType type)
 {
@@ -76,15 +75,15 @@ inline char* tracepara(
         buffer, text, file, line, ",Parameters List: ", parameters ? parameters : "(null)", type);
 }
 
-// Where a trace point stands, as the logging library is told.
+// The source location that the logging library writes with a trace point.
 struct TraceLocation {
     const char* function;
     const char* file;
     unsigned line;
 };
 
-// Sends one trace point to the log channel and to the trace channel. `line` formats the text
-// and is called once for each channel; not at all when neither wants the level.
+// Writes one trace point to the log channel, then to the trace channel. `line` formats the text; it
+// is called once for each channel, or not at all when neither wants the level.
 template <typename Line>
 void emit(const TraceLocation& at, const std::string& component, int level, const Line& line)
 {
@@ -110,7 +109,7 @@ inline constexpr unsigned enteringLine = 337;
 inline constexpr unsigned exitingLine = 348;
 inline constexpr unsigned exitSeparatorLine = 349;
 
-// 78 equals signs set one request's lines apart from the next one's.
+// Returns the line of 78 equals signs that separates requests.
 inline const char* separator()
 {
     return "==============================================================================";
@@ -118,7 +117,7 @@ inline const char* separator()
 
 } // namespace detail
 
-// Opens the bracket around a request: a separator and the handler's entering line.
+// Marks the start of a request with a separator and the handler's entering line.
 inline void markProviderEntry(
     const std::string& component, const char* function, const char* file, unsigned line)
 {
@@ -128,7 +127,7 @@ inline void markProviderEntry(
         [&] { return trace(function, file, line, Entering); });
 }
 
-// Closes the bracket: the handler's exiting line and a separator.
+// Marks the end of a request with the handler's exiting line and a separator.
 inline void markProviderExit(
     const std::string& component, const char* function, const char* file, unsigned line)
 {

@@ -1,17 +1,18 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The trace points of one function: its entering and exiting lines and its failures.
+// The trace points of one operation: its entering and exiting lines and its failures.
 
 #pragma once
 
 #include "diagnostics/Trace.h"
 
 #include <string>
+#include <type_traits>
 #include <utility>
 
 namespace Vorn {
 
-// The module whose name and component its trace lines carry.
+// The module that trace lines name, and its logger component.
 struct TraceModule {
     const std::string& component;
     const char* file;
@@ -23,7 +24,7 @@ struct OperationLines {
     unsigned exit;
 };
 
-// Labels and values one after the other, as a parameter list prints them.
+// Returns the labels and values, each printed as by a stream, in one text.
 template <typename... LabelsAndValues>
 std::string parameterList(const LabelsAndValues&... items)
 {
@@ -32,7 +33,7 @@ std::string parameterList(const LabelsAndValues&... items)
     return buffer.str();
 }
 
-// Writes a failure's message line.
+// Writes the message line of a failure.
 inline void traceMessage(
     const TraceModule& module, const char* function, unsigned line, const char* text)
 {
@@ -40,51 +41,38 @@ inline void traceMessage(
         [&] { return trace(text, module.file, line, Message); });
 }
 
-// Entering and exiting lines of an operation whose arguments are traced. `Parameters` returns
-// the parameter list and is called only when a line is wanted.
-template <typename Parameters>
+struct NoParameters {};
+
+// Writes the entering and exiting lines of an operation. `Parameters` returns the parameter list
+// and is called only when a line is wanted; without it the lines have none.
+template <typename Parameters = NoParameters>
 class TracedOperation {
 public:
-    TracedOperation(const TraceModule& module, const char* function, Parameters parameters)
+    TracedOperation(const TraceModule& module, const char* function, Parameters parameters = {})
         : module_(module), function_(function), parameters_(std::move(parameters))
     {
     }
 
+    // A line number that is not given is that of the call.
     void entering(unsigned line = __builtin_LINE()) const { mark(Entering, line); }
     void exiting(unsigned line = __builtin_LINE()) const { mark(Exiting, line); }
 
 private:
     void mark(MessageType type, unsigned line) const
     {
-        emit({function_, module_.file, line}, module_.component, markWithParametersLevel,
-            [&] { return tracepara(function_, module_.file, line, parameters_().c_str(), type); });
+        const TraceLocation at = {function_, module_.file, line};
+        if constexpr (std::is_same_v<Parameters, NoParameters>)
+            emit(at, module_.component, markLevel,
+                [&] { return trace(function_, module_.file, line, type); });
+        else
+            emit(at, module_.component, markWithParametersLevel, [&] {
+                return tracepara(function_, module_.file, line, parameters_().c_str(), type);
+            });
     }
 
     TraceModule module_;
     const char* function_;
     Parameters parameters_;
-};
-
-// The same for an operation without traced arguments.
-class PlainTracedOperation {
-public:
-    PlainTracedOperation(const TraceModule& module, const char* function)
-        : module_(module), function_(function)
-    {
-    }
-
-    void entering(unsigned line = __builtin_LINE()) const { mark(Entering, line); }
-    void exiting(unsigned line = __builtin_LINE()) const { mark(Exiting, line); }
-
-private:
-    void mark(MessageType type, unsigned line) const
-    {
-        emit({function_, module_.file, line}, module_.component, markLevel,
-            [&] { return trace(function_, module_.file, line, type); });
-    }
-
-    TraceModule module_;
-    const char* function_;
 };
 
 } // namespace Vorn

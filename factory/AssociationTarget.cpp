@@ -1,10 +1,9 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// What lies at the far end of an association.
+// Determines the far end of an association.
 
 #include "factory/BrokerCalls.h"
 #include "factory/ClassNames.h"
-#include "factory/FactoryModule.h"
 #include "factory/SensorFactory.h"
 #include "factory/TraceLines.h"
 
@@ -20,7 +19,7 @@ struct AssociationEnd {
     const char* associationClass;
     const char* targetClass;
     const char* provider;
-    const char* traceText; // whatever class it names: scripts look for it
+    const char* traceText; // names another class than the target; scripts match it
     unsigned exitingLine;
 };
 
@@ -39,13 +38,13 @@ constexpr std::array<AssociationEnd, 4> associationEnds = {{
         SensorElementCapabilitiesProvider, targetIsSystem, FactoryLines::targetOfCapabilities},
 }};
 
-// Letter for letter; what was not given equals nothing.
+// Compares with regard to case; null equals nothing.
 bool areEqual(const char* one, const char* other)
 {
     return one != nullptr && other != nullptr && std::strcmp(one, other) == 0;
 }
 
-// The string's characters are read afresh for each row: a broker may move them.
+// Reads the characters anew for each row, since a broker may move them.
 const AssociationEnd* findEnd(
     const CMPIString* sourceClass, const char* associationClass, CMPIStatus* rc)
 {

@@ -12,7 +12,7 @@ namespace Vorn::SensorProfileProvider {
 
 const char* charactersOf(const CMPIString* string, CMPIStatus* rc)
 {
-    // The slot itself: header sets differ in the convenience function's arguments.
+    // The slot is called directly: header sets differ in the arguments of the macro.
     return isUsable(string) ? string->ft->getCharPtr(string, rc) : nullptr;
 }
 

@@ -1,7 +1,8 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Calls to the broker that every operation makes, with their results tested: whatever a broker
-// fails to deliver is null here and never used. What is made belongs to the broker.
+// Calls to the broker, with their results tested: an object that is null or has no handle is
+// returned as null. Objects belong to the broker. A `CMPIStatus*` is passed on to the broker and
+// may be null.
 
 #pragma once
 
@@ -10,41 +11,41 @@
 
 namespace Vorn::SensorProfileProvider {
 
-// Neither null nor without a handle.
+// Returns whether the object is neither null nor without a handle.
 template <typename Object>
 bool isUsable(const Object* object)
 {
     return object != nullptr && object->hdl != nullptr;
 }
 
-// Null when there is no string or it has no characters. They live as long as the string.
+// Returns the characters, valid as long as the string, or null when there are none.
 const char* charactersOf(const CMPIString* string, CMPIStatus* rc);
 
-// Null when the path does not say.
+// Returns null when the path has no namespace.
 const char* nameSpaceOf(const CMPIObjectPath* path, CMPIStatus* rc);
-// Null when there is no path.
+// Returns null when the path is not usable.
 CMPIString* classNameOf(const CMPIObjectPath* path, CMPIStatus* rc);
 
-// Whether the path is of exactly that class, letter for letter.
+// Returns whether the class name of the path is exactly this one; case matters.
 bool isOfClass(const CMPIObjectPath* path, const char* className, CMPIStatus* rc);
 
-// A path without keys: the namespace of `ref`, the class, and this system as host. Null when
-// it cannot be made. `rc` goes to the broker and may be null.
+// Makes a path without keys, with the namespace of `ref`, the class, and this system as host.
+// Returns null when the broker fails.
 CMPIObjectPath* newPath(
     const CMPIBroker* broker, const CMPIObjectPath* ref, const char* className, CMPIStatus* rc);
 
-// Gives a path the namespace of `ref`, when that has one.
+// Sets the namespace of the path to that of `ref`, if there is one.
 void copyNameSpace(const CMPIObjectPath* path, const CMPIObjectPath* ref, CMPIStatus* rc);
 
 // Adds a key of type string.
 void addTextKey(const CMPIObjectPath* path, const char* name, const char* text);
 
-// Sends a message to the broker's trace facility.
+// Writes a message to the broker's trace facility (CMTraceMessage).
 void traceToBroker(
     const CMPIBroker* broker, CMPILevel level, const char* component, const char* text);
 
-// Reports a failure with its two texts, which differ more often than not: one for the client
-// in the status (when there is one), one for the broker's trace at warning level.
+// Reports a failure: sets the status, if there is one, to CMPI_RC_ERR_FAILED with one text, and
+// writes the other, which often differs, to the broker's trace at warning level.
 void reportFailure(const CMPIBroker* broker, CMPIStatus* rc, const char* component,
     const char* statusText, const char* traceText);
 

@@ -1,10 +1,9 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The factory's capabilities as CIM instances and object paths, ordered by instance identifier.
+// Enumerates capabilities as CIM instances and object paths, ordered by instance identifier.
 
 #include "factory/BrokerCalls.h"
 #include "factory/ClassNames.h"
-#include "factory/FactoryModule.h"
 #include "factory/SensorFactory.h"
 #include "factory/TraceLines.h"
 

@@ -1,10 +1,9 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// From a capabilities record to an instance of ZUMLO_SensorEnabledLogicalElementCapabilities.
+// Builds an instance of ZUMLO_SensorEnabledLogicalElementCapabilities from a record.
 
 #include "factory/BrokerCalls.h"
 #include "factory/ClassNames.h"
-#include "factory/FactoryModule.h"
 #include "factory/InstanceWriter.h"
 #include "factory/PropertySelection.h"
 #include "factory/SensorFactory.h"
@@ -16,8 +15,8 @@ namespace Vorn::SensorProfileProvider {
 
 namespace {
 
-// The instance with its filter. Null, or the handle-less instance the broker returned, when
-// there is none to go on with.
+// Makes an instance with its property filter. Returns what the broker returned when that is not
+// usable.
 CMPIInstance* newCapabilitiesInstance(
     const CMPIBroker* broker, const CMPIObjectPath* ref, const char** properties, CMPIStatus* rc)
 {

@@ -1,7 +1,7 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The classes this library serves and refers to, and the names of its providers, which are
-// also the components of their broker trace messages.
+// The classes that this library serves and refers to, and the names of its providers, which are the
+// components of their broker trace messages.
 
 #pragma once
 

@@ -11,8 +11,8 @@
 
 namespace Vorn::SensorProfileProvider {
 
-// Sets properties of one instance, each by the CMPI type it is published with. What the broker
-// says of a setting is not asked: a property it refuses is simply not there.
+// Sets properties of one instance, each with its CMPI type. The status of a setting is ignored: a
+// property that the broker refuses is absent.
 class InstanceWriter {
 public:
     // REQUIRES: the instance is usable and outlives the writer.
@@ -26,11 +26,11 @@ public:
     void setNumber(const char* name, std::int32_t number) const;
     void setFlag(const char* name, bool flag) const;
 
-    // False when the broker makes no array; the property is then left out. An empty list is an
-    // empty array. `rc` goes to the broker.
+    // Sets an array, also an empty one. Returns false, without the property, when the broker makes
+    // no array. `rc` is passed on to the broker.
     bool setCodes(const char* name, const std::vector<std::uint16_t>& codes, CMPIStatus* rc) const;
 
-    // The same for texts. An element whose string cannot be made is left empty.
+    // As setCodes(). An element stays empty when the broker cannot make its string.
     // REQUIRES: rc is not null.
     bool setTexts(const char* name, const std::vector<std::string>& texts, CMPIStatus* rc) const;
 

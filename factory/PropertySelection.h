@@ -2,26 +2,21 @@
 
 #pragma once
 
-#include <cstdint>
-#include <limits>
 #include <set>
 #include <string>
 
 namespace Vorn::SensorProfileProvider {
 
-// Which of a class's optional properties a request wants: without a list all of them, or none
-// when only an object path is needed; with a list exactly those it names, letter for letter.
+// Selects the optional properties of a class that a request wants: exactly those in its property
+// list (case matters); without a list all, or none when only an object path is needed.
 class PropertySelection {
 public:
     // `properties` is null or ends with a null entry.
     PropertySelection(const char** properties, bool isObjPath)
         : all_(properties == nullptr && !isObjPath)
     {
-        if (properties == nullptr)
-            return;
-        constexpr auto last = std::numeric_limits<std::uint16_t>::max();
-        for (std::uint16_t i = 0; properties[i] != nullptr && i < last; ++i)
-            names_.insert(properties[i]);
+        for (; properties != nullptr && *properties != nullptr; ++properties)
+            names_.insert(*properties);
     }
 
     bool wants(const char* name) const { return all_ || names_.contains(name); }

@@ -1,26 +1,14 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The factory's sensors as CIM instances and object paths, ordered by device identifier.
+// Enumerates sensors as CIM instances and object paths, ordered by device identifier.
 
 #include "factory/BrokerCalls.h"
 #include "factory/ClassNames.h"
-#include "factory/FactoryModule.h"
 #include "factory/SensorFactory.h"
+#include "factory/TraceLines.h"
 #include "platform/utilities/ProviderUtilities.h"
 
 namespace Vorn::SensorProfileProvider {
-
-namespace {
-
-void addSensorKeys(const CMPIObjectPath* path, const Sensor& sensor)
-{
-    addTextKey(path, "CreationClassName", SensorClass);
-    addTextKey(path, "DeviceID", sensor.getDeviceID().c_str());
-    addTextKey(path, "SystemCreationClassName", ComputerSystemClass);
-    addTextKey(path, "SystemName", getSystemName().c_str());
-}
-
-} // namespace
 
 int SensorFactory::getAllSensorCMPIInstances(const CMPIBroker* broker, const CMPIObjectPath* ref,
     const char** properties, bool isObjPath, std::vector<CMPIInstance*>& instances, CMPIStatus* rc)
@@ -75,7 +63,10 @@ int SensorFactory::getAllSensorCMPIObjPaths(const CMPIBroker* broker, const CMPI
             traced.exiting();
             return 2;
         }
-        addSensorKeys(path, sensor);
+        addTextKey(path, "CreationClassName", SensorClass);
+        addTextKey(path, "DeviceID", sensor.getDeviceID().c_str());
+        addTextKey(path, "SystemCreationClassName", ComputerSystemClass);
+        addTextKey(path, "SystemName", getSystemName().c_str());
         objectPaths.push_back(path);
     }
     traced.exiting();

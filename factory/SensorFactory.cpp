@@ -1,8 +1,8 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
 #include "factory/SensorFactory.h"
+#include "factory/TraceLines.h"
 
-#include "factory/FactoryModule.h"
 #include "model/SensorHarvest.h"
 
 #include <algorithm>
@@ -15,9 +15,9 @@ const std::string loggerSensorFactory = "Nimbrel.SensorFactory";
 
 namespace {
 
-// A map holds the last record of each key, moved out of the harvest: nothing asks for that again.
-// The count is cut to 16 bits. Inserted in the order of their keys the records lie in memory as
-// they are walked later; in harvest order every step of ten thousand would miss the cache.
+// Moves the records into a map, where the last one of a key replaces the others. The count is
+// truncated to 16 bits. Records are inserted in the order of their keys, so that iteration reads
+// memory in order; in harvest order, every step over ten thousand records misses the cache.
 template <typename Record, typename KeyOf>
 void indexRecords(std::vector<Record>& records, std::map<std::string, Record>& byKey, KeyOf keyOf)
 {
@@ -48,7 +48,7 @@ SensorFactory::SensorFactory(bool isSen, bool isCap)
 
 unsigned short SensorFactory::getNumberOfInstances()
 {
-    const PlainTracedOperation traced(factoryModule(), "getNumberOfInstances");
+    const TracedOperation traced(factoryModule(), "getNumberOfInstances");
     traced.entering();
     const auto count = static_cast<unsigned short>(sensorMap.size());
     traced.exiting();
@@ -57,7 +57,7 @@ unsigned short SensorFactory::getNumberOfInstances()
 
 void SensorFactory::_createSensorMap()
 {
-    const PlainTracedOperation traced(factoryModule(), "_createSensorMap");
+    const TracedOperation traced(factoryModule(), "_createSensorMap");
     traced.entering();
     indexRecords(vectSensor, sensorMap, [](const Sensor& sensor) { return sensor.getDeviceID(); });
     traced.exiting();
@@ -65,7 +65,7 @@ void SensorFactory::_createSensorMap()
 
 void SensorFactory::_createEnabledLogicalElementCapMap()
 {
-    const PlainTracedOperation traced(factoryModule(), "_createEnabledLogicalElementCapMap");
+    const TracedOperation traced(factoryModule(), "_createEnabledLogicalElementCapMap");
     traced.entering();
     indexRecords(vectSensorEnabledLogCap, sensorEnabledLogCapMap,
         [](SensorEnabledLogCap capabilities) { return capabilities.getInstanceID(); });

@@ -13,45 +13,42 @@
 
 namespace Vorn::SensorProfileProvider {
 
-// What one request needs to answer: built on the handler's stack, it harvests the machine and
-// turns the records into CIM instances and object paths. Nothing outlives it but the CMPI
-// objects, which belong to the broker.
+// Harvests the machine for one request and converts the records into CIM instances and object
+// paths. A handler creates it on its stack. The CMPI objects belong to the broker and outlive it.
 //
-// Operations return 0 for success, 1 when nothing was found and 2 when the broker failed, and
-// write the CMPIStatus they are given only on a failure of the broker. A nothing-found outcome
-// leaves it as it was. Parameters named `ref` are the request's object path, of which only the
-// namespace is read; `properties` is the client's property list, null for all properties.
+// Operations return 0 on success, 1 when nothing was found and 2 when the broker failed. They set
+// the CMPIStatus only when the broker failed. `ref` is the request's object path, of which only
+// the namespace is read; `properties` is the client's property list, null for all properties.
 //
-// Used by one thread. Throws nothing but for lack of memory.
+// For one thread. Operations throw only std::bad_alloc.
 class SensorFactory {
 public:
-    // Empty; harvests nothing.
+    // Creates an empty factory without a harvest.
     SensorFactory() = default;
-    // Harvests sensors, capabilities or both. A failed harvest leaves the factory without
-    // them.
+    // Harvests sensors, capabilities or both; after a failed harvest there are none.
     SensorFactory(bool isSen, bool isCap);
     SensorFactory(const SensorFactory&) = delete;
     SensorFactory& operator=(const SensorFactory&) = delete;
 
-    // How many sensors there are, counted by device identifier and cut to 16 bits.
+    // Returns the number of device identifiers, truncated to 16 bits.
     unsigned short getNumberOfInstances();
 
-    // One instance of ZUMLO_NumericSensor, or null (or a handle-less instance) when the broker
-    // made none. An array the broker cannot make ends the build or leaves its property out;
-    // the instance built so far is returned and the failure stands in rc, which must be looked
-    // at as well. `isObjPath` asks for the keys alone and matters only without a property list.
+    // Returns an instance of ZUMLO_NumericSensor, or null (or an instance without a handle) when
+    // the broker made none. When the broker cannot make an array, the build ends or omits its
+    // property; the partial instance is returned and rc holds the failure, so callers check rc
+    // too. `isObjPath` selects the keys alone and matters only without a property list.
     // REQUIRES: rc is not null.
     CMPIInstance* makeSensorInstance(const CMPIBroker* broker, const CMPIObjectPath* ref,
         Sensor snsr, const char** properties, bool isObjPath, CMPIStatus* rc);
 
-    // Appends one instance for each sensor, ordered by device identifier; entries may be null
-    // when the broker made none. Always returns 0.
+    // Appends one instance for each sensor, ordered by device identifier; an entry is null where
+    // the broker made none. Returns 0.
     int getAllSensorCMPIInstances(const CMPIBroker* broker, const CMPIObjectPath* ref,
         const char** properties, bool isObjPath, std::vector<CMPIInstance*>& instances,
         CMPIStatus* rc);
 
-    // Appends the instance of the sensor with exactly this device identifier. Returns 0 when
-    // there is one, otherwise 1.
+    // Appends the instance of the sensor with exactly this device identifier. Returns 0, or 1 when
+    // there is none.
     int getOneSensorCMPIInstance(const CMPIBroker* broker, const CMPIObjectPath* ref,
         CMPIString* key, const char** properties, std::vector<CMPIInstance*>& instances,
         CMPIStatus* rc);
@@ -61,15 +58,14 @@ public:
     int getAllSensorCMPIObjPaths(const CMPIBroker* broker, const CMPIObjectPath* ref,
         std::vector<CMPIObjectPath*>& objectPaths, CMPIStatus* status);
 
-    // One instance of ZUMLO_SensorEnabledLogicalElementCapabilities, or null (or a handle-less
-    // instance) when the broker made none. An array the broker cannot make is left out; the
-    // failure stands in rc, which must be looked at as well and may be null. `isObjPath` as
-    // above.
+    // Returns an instance of ZUMLO_SensorEnabledLogicalElementCapabilities, or null (or an
+    // instance without a handle) when the broker made none. A property whose array cannot be made
+    // is omitted, with the failure in rc, which may be null. `isObjPath` as above.
     CMPIInstance* makeSensorEnabledLogicalElementCapInstance(const CMPIBroker* broker,
         const CMPIObjectPath* ref, SensorEnabledLogCap snsrCap, const char** properties,
         bool isObjPath, CMPIStatus* rc);
 
-    // The same three operations for the capabilities, ordered by instance identifier.
+    // As for sensors, ordered by instance identifier.
     int getAllSensorEnabledLogicalElementCapCMPIInstances(const CMPIBroker* broker,
         const CMPIObjectPath* ref, const char** properties, bool isObjPath,
         std::vector<CMPIInstance*>& instances, CMPIStatus* rc);
@@ -79,16 +75,16 @@ public:
     int getAllSensorEnabledLogicalElementCapCMPIObjPaths(const CMPIBroker* broker,
         const CMPIObjectPath* ref, std::vector<CMPIObjectPath*>& objectPaths, CMPIStatus* status);
 
-    // The class at the far end of the association `_RefLeftClass` from an object of the path's
-    // class: one of the constants of ClassNames.h, or null when the path's class is no end of
-    // that association. Names are compared letter for letter. `_RefRightClass` is only traced;
-    // both may be null. rc goes to the broker and is not written otherwise.
+    // Returns the class at the far end of the association `_RefLeftClass` from an object of the
+    // path's class: a constant of ClassNames.h, or null when that class is no end of the
+    // association. Case matters. `_RefRightClass` is only traced; both may be null. rc is passed
+    // on to the broker and not written otherwise.
     static const char* get_assoc_targetClass_Name(const CMPIBroker* broker,
         const CMPIObjectPath* ref, const char* _RefLeftClass, const char* _RefRightClass,
         CMPIStatus* rc);
 
-    // A path without keys of that class, in the namespace of the request and on this system.
-    // Null when there is no such class or the broker made no path.
+    // Returns a path of that class without keys, in the namespace of the request and with this
+    // system as host, or null when there is no such class or the broker made no path.
     static CMPIObjectPath* get_assoc_targetClass_ObjectPath(const CMPIBroker* broker,
         const CMPIObjectPath* ref, const char* _RefLeftClass, const char* _RefRightClass,
         CMPIStatus* rc);
@@ -97,7 +93,7 @@ private:
     void _createSensorMap();
     void _createEnabledLogicalElementCapMap();
 
-    // In harvest order, duplicates included; their content is in the maps once these are made.
+    // In harvest order, duplicates included. The maps take over the content of the records.
     std::vector<Sensor> vectSensor;
     std::vector<SensorEnabledLogCap> vectSensorEnabledLogCap;
     std::map<std::string, Sensor> sensorMap; // by device identifier; the later duplicate wins

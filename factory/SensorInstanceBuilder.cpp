@@ -1,10 +1,9 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// From a sensor record to an instance of ZUMLO_NumericSensor.
+// Builds an instance of ZUMLO_NumericSensor from a record.
 
 #include "factory/BrokerCalls.h"
 #include "factory/ClassNames.h"
-#include "factory/FactoryModule.h"
 #include "factory/InstanceWriter.h"
 #include "factory/PropertySelection.h"
 #include "factory/SensorFactory.h"
@@ -27,7 +26,7 @@ constexpr const char* operation = "makeSensorInstance";
 // The number by which the localised texts know this library.
 constexpr unsigned long resourceComponent = 2;
 
-// Captions and descriptions are cut to one character less than this.
+// Captions and descriptions are truncated to one character less.
 constexpr std::size_t localisedTextSize = 512;
 
 std::string localised(const wchar_t* messageId, const std::string& elementName)
@@ -38,8 +37,8 @@ std::string localised(const wchar_t* messageId, const std::string& elementName)
     return make_string(formatText(resource.text(), elementName, localisedTextSize));
 }
 
-// The instance with its filter and keys. Null, or the handle-less instance the broker returned,
-// when there is none to go on with.
+// Makes an instance with its property filter and keys. Returns what the broker returned when that
+// is not usable.
 CMPIInstance* newSensorInstance(const CMPIBroker* broker, const CMPIObjectPath* ref,
     const Sensor& sensor, const char** properties)
 {
@@ -60,11 +59,11 @@ CMPIInstance* newSensorInstance(const CMPIBroker* broker, const CMPIObjectPath* 
     return instance;
 }
 
-// What an array that the broker cannot make is reported with.
+// How an array that the broker cannot make is reported.
 struct ArrayFailure {
     const char* statusText;
     const char* traceText;
-    std::optional<unsigned> exitingLine; // absent where the exiting line is left out
+    std::optional<unsigned> exitingLine; // absent where none is written
 };
 
 // The runs of blanks are part of the texts.
@@ -77,7 +76,7 @@ constexpr const char* operationalStatusFailed =
 constexpr const char* operationalStatusFailedTrace =
     "Create Array for Property Operat                        ionalStatus failed.";
 
-// Sets the selected properties of one instance in their order.
+// Sets the selected properties of one instance in order.
 class SensorProperties {
 public:
     SensorProperties(Sensor& sensor, const PropertySelection& selection,
@@ -86,7 +85,7 @@ public:
     {
     }
 
-    // The failure that ended the build, if one did.
+    // Returns the failure that ended the build, if there was one.
     std::optional<ArrayFailure> set()
     {
         setNames();
@@ -124,7 +123,7 @@ private:
             return;
         const std::vector<std::string> states = sensor_.getPossibleStates();
         if (static_cast<std::uint16_t>(states.size()) == 0)
-            return; // unlike a list of codes, an empty list of labels is not published
+            return; // unlike codes, no labels are no property
         if (!writer_.setTexts("PossibleStates", states, rc_))
             traceMessage(factoryModule(), operation, FactoryLines::possibleStatesFailed,
                 "Failed to create CMPIArray for PossibleStates");

@@ -1,14 +1,25 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The line numbers in the factory's trace lines. Monitoring scripts match them, so they are an
-// interface: they do not follow the source. Operations that are not listed carry the line of
-// their source.
+// The factory's trace lines: the module they name, whichever of its files writes them, and their
+// line numbers. Monitoring scripts match the numbers, so they are an interface and do not follow
+// the source. Operations that are not listed carry the line of their source.
 
 #pragma once
 
 #include "diagnostics/TracedOperation.h"
 
-namespace Vorn::SensorProfileProvider::FactoryLines {
+#include <string>
+
+namespace Vorn::SensorProfileProvider {
+
+extern const std::string loggerSensorFactory;
+
+inline TraceModule factoryModule()
+{
+    return {loggerSensorFactory, "SensorFactory"};
+}
+
+namespace FactoryLines {
 
 inline constexpr OperationLines makeSensorInstance = {.entry = 269, .exit = 737};
 inline constexpr unsigned possibleStatesFailed = 440;
@@ -28,4 +39,6 @@ inline constexpr unsigned targetOfCapabilities = 1252;
 inline constexpr unsigned noTarget = 1259;
 inline constexpr OperationLines targetPath = {.entry = 1288, .exit = 1316};
 
-} // namespace Vorn::SensorProfileProvider::FactoryLines
+} // namespace FactoryLines
+
+} // namespace Vorn::SensorProfileProvider

@@ -12,8 +12,8 @@ namespace Vorn::SensorProfileProvider {
 
 namespace {
 
-// The product keeps 64 bits of significand and is cut as it stands: 3.3 V become 3299 mV.
-// Rounded to double first it would be 3300.
+// The product has a significand of 64 bits and is truncated without rounding: 3.3 V become 3299 mV.
+// Rounding to double first would give 3300.
 static_assert(std::numeric_limits<long double>::digits >= 64);
 
 template <typename Number>
@@ -22,7 +22,7 @@ std::int32_t truncated(Number product)
     constexpr std::int32_t outOfRange = std::numeric_limits<std::int32_t>::min();
     constexpr Number above = 2147483648.0;
     constexpr Number below = -2147483649.0;
-    if (product > below && product < above) // false for what is not a number
+    if (product > below && product < above) // false for NaN
         return static_cast<std::int32_t>(product);
     return outOfRange;
 }
@@ -64,8 +64,7 @@ std::vector<std::string> Sensor::getPossibleStates()
 
 std::uint16_t Sensor::getRateUnits()
 {
-    rateUnits_ = 0;
-    return rateUnits_;
+    return rateUnits_ = 0;
 }
 
 std::vector<std::uint16_t> Sensor::getSupportedThresholds()
@@ -153,7 +152,7 @@ bool Sensor::setOperationalStatus(unsigned nodeStatus)
 
 bool Sensor::setPossibleStates(std::vector<unsigned> nodeStatuses)
 {
-    constexpr unsigned unknown = 0; // without a label of its own, as what is too large
+    constexpr unsigned unknown = 0; // also stands for codes too large to store
     constexpr unsigned largest = std::numeric_limits<Codes::value_type>::max();
     possibleStates_.clear();
     fixedStateLabels_ = 0;
@@ -165,7 +164,7 @@ bool Sensor::setPossibleStates(std::vector<unsigned> nodeStatuses)
 
 bool Sensor::storeScaled(std::int32_t& field, double value) const
 {
-    field = readingMultiplier_ == 1.0 // the common case, and several times as fast
+    field = readingMultiplier_ == 1.0 // the common case, several times as fast
                 ? truncated(value)
                 : truncated(static_cast<long double>(value) * readingMultiplier_);
     return true;

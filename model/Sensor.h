@@ -8,18 +8,17 @@
 
 namespace Vorn::SensorProfileProvider {
 
-// One numeric sensor in CIM form. Setters take the hardware model's codes (a sensor type, a
-// node status) and store the numbers of the DMTF value maps of CIM_NumericSensor and its
-// ancestors; getters return what the CIM property of the same name is published with.
+// Holds one numeric sensor in CIM form. Setters take the codes of the hardware model (a sensor
+// type, a node status) and store the numbers of the DMTF value maps of CIM_NumericSensor and its
+// ancestors; each getter returns the value of the CIM property of the same name.
 //
-// Readings and thresholds are scaled to whole units of 10^UnitModifier: setSensorType()
-// decides the scale and must run before any of their setters.
+// Readings and thresholds are scaled to whole units of 10^UnitModifier. setSensorType() sets the
+// scale, so it is called before their setters.
 //
-// Some getters write to the record before they return: the list-appending ones grow their
-// list at every call, getRateUnits() forgets the rate. Callers that want the plain lists call
-// them once on a copy.
+// Some getters change the record: those that append extend their list at every call, and
+// getRateUnits() resets the rate. Callers that need the plain lists call them once on a copy.
 //
-// A value type for one thread. Nothing throws but for lack of memory.
+// A value type for one thread. Functions throw only std::bad_alloc.
 class Sensor {
 public:
     Sensor() = default;
@@ -50,8 +49,8 @@ public:
     std::vector<std::uint16_t> getSupportedThresholds(); // appends 0 to 5
     std::vector<std::uint16_t> getSettableThresholds();  // appends 0 to 5
 
-    // Every setter returns whether the value was accepted. A refused value is stored all the
-    // same; only an empty device identifier, an empty name and a zero rate are refused.
+    // Each setter returns whether it accepts the value. Only an empty device identifier, an empty
+    // name and a zero rate are refused; a refused value is stored nevertheless.
     bool setDeviceID(std::string deviceID);
     bool setElementName(std::string elementName);
     bool setBaseUnits(unsigned code);
@@ -73,13 +72,12 @@ public:
     bool setUpperThresholdFatal(double value);
 
 private:
-    // In base units times the multiplier, truncated toward zero.
+    // Stores the value times the multiplier, truncated toward zero. Returns true.
     bool storeScaled(std::int32_t& field, double value) const;
 
-    // A machine may have many thousand sensors, so a record is kept small. A string holds a few
-    // codes in itself, where a vector would be a piece of the heap for each; lists that always
-    // grow by the same elements are numbers of times; and labels are those of the value tables,
-    // which live as long as the process.
+    // A machine may have thousands of sensors, so a record is small. A string stores a few codes
+    // in place, where a vector would allocate; a list that grows by the same elements is stored as
+    // the number of repetitions; labels point into the value tables, which are static.
     using Codes = std::u16string;
 
     std::string deviceID_;
@@ -91,8 +89,8 @@ private:
     double readingMultiplier_ = 1.0;
     std::uint16_t baseUnits_ = 0;
     std::uint16_t rateUnits_ = 0;
-    std::uint32_t fixedStateLabels_ = 0;    // how many times they follow the possible states
-    std::uint32_t supportedThresholds_ = 0; // how many times 0 to 5
+    std::uint32_t fixedStateLabels_ = 0;    // how many times they are appended
+    std::uint32_t supportedThresholds_ = 0; // how many times 0 to 5 is appended
     std::uint32_t settableThresholds_ = 0;  // the same
     std::uint16_t sensorType_ = 0;
     std::uint16_t enabledState_ = 0;

@@ -8,17 +8,20 @@
 
 namespace Vorn::SensorProfileProvider {
 
-// The capabilities every sensor of the machine shares: which requested states it accepts and
-// whether its name can be edited. The values are the same on all machines; each accessor stores
-// its value before it returns it. A value type for one thread.
+// Holds the capabilities that all sensors of the machine share: which requested states they accept
+// and whether their names can be edited. The values are the same on every machine; each accessor
+// stores its value before it returns it. A value type for one thread.
 class SensorEnabledLogCap {
 public:
-    SensorEnabledLogCap() = default;
+    std::string getInstanceID() { return instanceID_ = "ZUMLO:SensorEnabledLogicalElementCap1"; }
+    bool getElementNameEditSupported() { return elementNameEditSupported_ = false; }
 
-    std::string getInstanceID();
-    bool getElementNameEditSupported();
-    // Appends 0, 1 and 2 at every call; called once on a copy it returns just these.
-    std::vector<std::uint16_t> getStatesSupported();
+    // Appends 0, 1 and 2 at every call; the first call on a copy returns exactly these.
+    std::vector<std::uint16_t> getStatesSupported()
+    {
+        statesSupported_.insert(statesSupported_.end(), {0, 1, 2});
+        return statesSupported_;
+    }
 
 private:
     std::string instanceID_;

@@ -29,7 +29,7 @@ TraceModule module()
 constexpr std::array<NodeType, 3> harvestedTypes = {
     NodeType::Temperature, NodeType::Voltage, NodeType::Tachometer};
 
-// What the request handlers ask of every sensor.
+// The state that is requested of every sensor.
 constexpr unsigned requestedEnabled = 1;
 
 struct ScaledProperty {
@@ -70,7 +70,7 @@ void setIdentity(Sensor& sensor, const Instrumentation& node)
     require(sensor.setSensorType(node.getSensorType()), "Failed while setting Sensor Type");
 }
 
-// A node that reports no status leaves the record's states at their defaults.
+// Leaves the states at their defaults when the node reports no status.
 void setStatus(Sensor& sensor, unsigned status)
 {
     if (status == 0)
@@ -97,7 +97,7 @@ void setProperties(Sensor& sensor, Instrumentation& node, std::vector<unsigned>&
         require(sensor.setBaseUnits(baseUnits), "Failed while setting Requested State");
 }
 
-// True when there was a node of the type and all of them were walked.
+// Returns whether there are nodes of the type. All of them are read.
 bool harvestType(NodeType type, std::vector<Sensor>& vectSensor)
 {
     Instrumentation instrumentation;
@@ -120,7 +120,7 @@ bool getSensorInstances(std::vector<Sensor>& vectSensor)
             if (harvestType(type, vectSensor))
                 nothing = false;
         } catch (const std::exception& error) {
-            // Copied down to the base class on purpose: what is printed is its generic text.
+            // The copy is deliberately of the base class: its generic text is printed.
             const std::exception generic = error;
             RynLog::writeToStandardError(std::string(generic.what()) + '\n');
         }

@@ -1,7 +1,7 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The harvest: what the instrumentation says now, as plain records. Nothing is kept from one
-// call to the next. Results are inverted: true means that nothing was harvested.
+// The harvest reads the instrumentation into plain records. It keeps no state between calls.
+// Results are inverted: true means that nothing was harvested.
 
 #pragma once
 
@@ -16,18 +16,18 @@ class Instrumentation;
 
 namespace Vorn::SensorProfileProvider {
 
-// Appends the temperatures, voltages and tachometers of the machine, type by type. A type whose
-// walk fails is reported on standard error and left where it failed; the others follow.
-// Returns false when at least one type was present and walked to its end.
+// Appends the temperatures, voltages and tachometers of the machine, type by type. A type that
+// fails is reported on standard error; the records before its failure stay, and the next type
+// follows. Returns false when at least one type was present and read to its end.
 bool getSensorInstances(std::vector<Sensor>& vectSensor);
 
-// Walks a cursor from its present node to the last of the selected type and appends a record
-// for each. Returns false. Throws ProviderException naming the value that a record refused,
-// with the cursor still on that node, and whatever the instrumentation throws.
+// Appends a record for each node from the cursor's current one to the last of the selected type.
+// Returns false. Throws ProviderException, with the cursor on the node, when a record refuses a
+// value; exceptions of the instrumentation propagate.
 bool setVector(std::vector<Sensor>& vectSensor, Vorn::Instrumentation& instrumentation);
 
-// Appends the one capabilities record. Returns true, having reported on standard error, when
-// a standard exception kept it from being appended.
+// Appends the one capabilities record. Returns true after a standard exception, which it reports on
+// standard error.
 bool getSensorEnabledLogCapInstances(std::vector<SensorEnabledLogCap>& vectSensorEnabledLogCap);
 
 } // namespace Vorn::SensorProfileProvider

@@ -1,11 +1,11 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// What the hardware model's codes become in CIM. The right-hand numbers are those of the DMTF
+// Maps the hardware model's codes to CIM values. The numbers on the right are those of the DMTF
 // value maps of CIM_NumericSensor, CIM_EnabledLogicalElement and CIM_ManagedSystemElement.
 //
-// The same node status reads differently in different tables, on purpose: 20 is no state of
-// its own, degraded health and a predictive failure; 21 to 26 are states and health, but tell
-// nothing of the operational status.
+// A node status has deliberately different meanings in different tables: 20 is an unknown state,
+// degraded health and a predictive failure; 21 to 26 are states and health, but an unknown
+// operational status.
 
 #pragma once
 
@@ -35,7 +35,7 @@ struct ValueTable {
     }
 };
 
-// A sensor type code gives the published type and the scale of readings and thresholds.
+// The published type of a sensor type code, and the scale of its readings and thresholds.
 struct TypeAndScale {
     std::uint16_t sensorType;
     double multiplier;
@@ -108,7 +108,7 @@ inline constexpr ValueTable<std::uint16_t, 9> operationalStatuses = {{{
 }}, 0};       // Unknown
 // clang-format on
 
-// Published for every sensor after the states its node names.
+// The labels that are published for every sensor after those of its node.
 inline constexpr std::array<const char*, 12> fixedStateLabels = {"Normal", "Warning",
     "Non-Critical", "Lower Non-Critical", "Upper Non-Critical", "Critical", "Lower Critical",
     "Upper Critical", "Fatal", "Lower Fatal", "Upper Fatal", "Unknown"};

@@ -8,10 +8,10 @@ namespace Vorn::SensorProfileProvider {
 
 namespace {
 
-void returnAssociation(Answer answer, const CMPIResult* rslt, const CMPIObjectPath* op,
+void returnAssociation(ResultKind kind, const CMPIResult* rslt, const CMPIObjectPath* op,
     const CMPIInstance* association, CMPIStatus* status)
 {
-    if (answer == Answer::instances) {
+    if (kind == ResultKind::instances) {
         CMReturnInstance(rslt, association);
         return;
     }
@@ -37,20 +37,18 @@ void AssociationRequest::failWithoutTarget(
     marks_.exit(line);
 }
 
-void AssociationRequest::returnReferences(Answer answer, const CMPIResult* rslt,
+void AssociationRequest::returnReferences(ResultKind kind, const CMPIResult* rslt,
     const CMPIObjectPath* op, const CMPIObjectPath* path, bool leadsToSensors,
     const std::vector<CMPIObjectPath*>& farEnds, CMPIStatus* status) const
 {
-    std::vector<CMPIInstance*> associations;
-    associations.reserve(farEnds.size());
     forEachCounted(farEnds, [&](const CMPIObjectPath* farEnd) {
-        associations.push_back(newAssociation(broker_, path,
-            leadsToSensors ? served_.pair(farEnd, op) : served_.pair(op, farEnd), nullptr,
-            nullptr));
-    });
-    for (const CMPIInstance* const association : associations)
+        const References references =
+            leadsToSensors ? served_.pair(farEnd, op) : served_.pair(op, farEnd);
+        const CMPIInstance* const association =
+            newAssociation(broker_, path, references, nullptr, nullptr);
         if (isUsable(association))
-            returnAssociation(answer, rslt, op, association, status);
+            returnAssociation(kind, rslt, op, association, status);
+    });
 }
 
 void addReferenceKeys(const CMPIObjectPath* path, const References& references)

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// What the handlers of the two association providers share.
+// The parts of requests that the two association providers share.
 
 #pragma once
 
@@ -17,47 +17,47 @@
 
 namespace Vorn::SensorProfileProvider {
 
-// Whether a request wants objects or only their paths.
-enum class Answer { instances, paths };
+// Whether a request returns objects or only their paths.
+enum class ResultKind { instances, paths };
 
-// One end of an association: the reference property and what it refers to.
+// One end of an association: the name of the reference property and its value.
 struct Reference {
     const char* role;
     const CMPIObjectPath* path;
 };
 using References = std::array<Reference, 2>;
 
-// What one association class differs in from another.
+// The properties of an association class that its requests depend on.
 struct AssociationClass {
     TraceModule module;
     const char* provider; // the component of broker trace messages
     const char* name;
     bool isCap; // needs capabilities besides sensors
-    // The references of one association, in the order they are published in.
+    // Returns the references of one association in the order in which they are set.
     References (*pair)(const CMPIObjectPath* sensor, const CMPIObjectPath* other);
 };
 
-// How one failure reads for the client, in the broker's trace and in a message line.
+// The texts of one failure in the status, in the broker's trace and in a message line.
 struct FailureTexts {
     const char* status;
     const char* trace;
     const char* message; // null for no message line
 };
 
-// The message lines of fetches that failed.
+// The message lines of failed enumerations.
 inline constexpr const char* sensorsFailed = "getAllSensorCMPIInstances failed";
 inline constexpr const char* sensorPathsFailed = "getAllSensorCMPIObjPaths failed";
 inline constexpr const char* capabilitiesPathsFailed =
     "getAllSensorEnabledLogicalElementCapCMPIObjPaths failed";
 
-// What came of fetching one end's objects.
+// The failure of enumerating the objects of one end, if there was one.
 struct FetchFailure {
     const char* text; // of the message line; null when all went well
     bool hasExitMark = true;
 };
 
-// One request to an association provider: its broker, its marks and how it reports failures. The
-// trace lines it writes carry the caller's line.
+// One request to an association provider. It holds the broker, writes the marks and reports
+// failures. The trace lines carry the line of the call.
 class AssociationRequest {
 public:
     // Writes the entry mark of the function.
@@ -79,12 +79,13 @@ public:
             marks_.failure(texts.message, line);
     }
 
-    // What the source's class has no far end in this association is answered with.
+    // Reports that the class of the source has no far end in this association, and ends the
+    // request.
     void failWithoutTarget(
         const char* text, CMPIStatus* status, unsigned line = __builtin_LINE()) const;
 
-    // Finds the instance of the request's path among all that `build(instances)` makes (0 for
-    // success), and ends the request.
+    // Returns the instance at the request's path to the object manager, if it is among those that
+    // `build(instances)` appends (it returns 0 on success), and ends the request.
     template <typename Build>
     CMPIStatus getInstance(const CMPIResult* rslt, const CMPIObjectPath* op, const Build& build,
         unsigned line = __builtin_LINE()) const
@@ -100,8 +101,8 @@ public:
         return status;
     }
 
-    // Hands over all that `build(instances)` makes, and ends the request: well, whatever comes
-    // of the building.
+    // Returns all instances that `build(instances)` appends to the object manager, and ends the
+    // request with status OK, also when building fails.
     template <typename Build>
     CMPIStatus enumerateInstances(
         const CMPIResult* rslt, const Build& build, unsigned line = __builtin_LINE()) const
@@ -114,7 +115,7 @@ public:
         return {CMPI_RC_OK, nullptr};
     }
 
-    // The paths of all sensors.
+    // Appends the paths of all sensors.
     FetchFailure fetchSensorPaths(SensorFactory& factory, const CMPIObjectPath* op,
         std::vector<CMPIObjectPath*>& paths, CMPIStatus* status) const
     {
@@ -122,12 +123,12 @@ public:
                                                                              : nullptr};
     }
 
-    // Hands over one association for each far end, with the source at its other end, and ends
-    // the request. `fetch(factory, target, leadsToSensors, farEnds, status)` finds the far ends;
-    // it returns its FetchFailure. `withoutTarget` is the failure of a source whose class has no
+    // Returns one association of the source with each far end to the object manager, and ends the
+    // request. `fetch(factory, target, leadsToSensors, farEnds, status)` appends the far ends and
+    // returns a FetchFailure. `withoutTarget` is the failure text for a source whose class has no
     // far end.
     template <typename Fetch>
-    CMPIStatus references(Answer answer, const CMPIResult* rslt, const CMPIObjectPath* op,
+    CMPIStatus references(ResultKind kind, const CMPIResult* rslt, const CMPIObjectPath* op,
         const char* withoutTarget, const Fetch& fetch, unsigned line = __builtin_LINE()) const
     {
         CMPIStatus status = {CMPI_RC_OK, nullptr};
@@ -141,11 +142,11 @@ public:
             return status;
         }
         if (const CMPIObjectPath* const path = newPath(broker_, op, served_.name, &status)) {
-            // Asked once: a broker that answers differently later would turn the pairs round.
+            // Evaluated once, since a different answer later would swap the ends of the pairs.
             const bool leadsToSensors = isOfClass(target, SensorClass, &status);
             const FetchFailure failure = fetch(factory, target, leadsToSensors, farEnds, &status);
             if (failure.text == nullptr)
-                returnReferences(answer, rslt, op, path, leadsToSensors, farEnds, &status);
+                returnReferences(kind, rslt, op, path, leadsToSensors, farEnds, &status);
             else
                 marks_.failure(failure.text, line);
             if (!failure.hasExitMark)
@@ -156,8 +157,8 @@ public:
     }
 
 private:
-    // What the broker could not make is left out.
-    void returnReferences(Answer answer, const CMPIResult* rslt, const CMPIObjectPath* op,
+    // Omits associations that the broker cannot make.
+    void returnReferences(ResultKind kind, const CMPIResult* rslt, const CMPIObjectPath* op,
         const CMPIObjectPath* path, bool leadsToSensors,
         const std::vector<CMPIObjectPath*>& farEnds, CMPIStatus* status) const;
 
@@ -166,8 +167,8 @@ private:
     HandlerMarks marks_;
 };
 
-// The association class that a request for associated objects names; the provider's own where
-// the object manager hands over none.
+// Returns the association class of a request for associated objects; an object manager that passes
+// none means the provider's own.
 inline const char* namedOrOwn(const char* assocClass, const char* own)
 {
     return assocClass ? assocClass : own;
@@ -175,15 +176,14 @@ inline const char* namedOrOwn(const char* assocClass, const char* own)
 
 void addReferenceKeys(const CMPIObjectPath* path, const References& references);
 
-// An instance at the path, with its references as properties. `properties` and `keys` are its
-// filter; no filter when `keys` is null. Null, or the handle-less instance the broker returned,
-// when there is none.
+// Makes an instance at the path with the references as properties. `properties` and `keys` are its
+// property filter; there is none when `keys` is null. Returns what the broker returned when that is
+// not usable.
 CMPIInstance* newAssociation(const CMPIBroker* broker, const CMPIObjectPath* path,
     const References& references, const char** properties, const char** keys);
 
-// Visits the elements of an up-call's answer until there are no more, `visit` returns false or
-// the broker fails: then the result is false and its status stands in `status`. No answer has no
-// elements.
+// Visits the elements of an enumeration until `visit` returns false. Returns false, with the
+// broker's status in `status`, when the broker fails. An unusable enumeration counts as empty.
 template <typename Visit>
 bool forEachElement(const CMPIEnumeration* elements, CMPIStatus* status, const Visit& visit)
 {
@@ -201,7 +201,7 @@ bool forEachElement(const CMPIEnumeration* elements, CMPIStatus* status, const V
     return false;
 }
 
-// The path or the instance of an element; null when it is none.
+// Return the path or the instance of an element, or null when it is of another type or not usable.
 CMPIObjectPath* pathOf(const CMPIData& element);
 CMPIInstance* instanceOf(const CMPIData& element);
 

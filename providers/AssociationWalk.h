@@ -10,8 +10,8 @@
 
 namespace Vorn::SensorProfileProvider {
 
-// What the walks over all pairs of an association share: the factory, the fetching of sensors
-// and the making of each pair's path.
+// Base of the iterations over all pairs of an association: holds the factory, enumerates the ends
+// and makes the path of each pair.
 class AssociationWalk {
 public:
     AssociationWalk(const AssociationRequest& request, const CMPIObjectPath* op, CMPIStatus* status)
@@ -19,14 +19,14 @@ public:
     {
     }
 
-    // Makes room for one object for each sensor.
+    // Reserves room for one object for each sensor.
     template <typename Object>
     void reserve(std::vector<Object*>& objects)
     {
         objects.reserve(factory_.getNumberOfInstances());
     }
 
-    // Whether the factory ended the walk because there is nothing, not because it failed.
+    // Returns whether the last enumeration found nothing, as opposed to a failure of the broker.
     bool foundNothing() const { return result_ == nothingFound; }
 
 protected:
@@ -34,7 +34,7 @@ protected:
     const CMPIObjectPath* op() const { return op_; }
     CMPIStatus* status() const { return status_; }
 
-    // False when there are none or the broker failed.
+    // Append paths. Return false when there are none or the broker failed.
     bool fetchSensors(std::vector<CMPIObjectPath*>& paths)
     {
         reserve(paths);
@@ -43,14 +43,13 @@ protected:
     }
     bool fetchCapabilities(std::vector<CMPIObjectPath*>& paths)
     {
-        paths.reserve(1);
         result_ = factory_.getAllSensorEnabledLogicalElementCapCMPIObjPaths(
             request_.broker(), op_, paths, status_);
         return result_ == 0;
     }
 
-    // Calls `visit` with a new path of the association, without keys, and its references. False
-    // when the path cannot be made, which has been reported.
+    // Calls `visit` with a new path of the association, without keys, and its references. Returns
+    // false after it reported that the path cannot be made.
     template <typename Visit>
     bool visitPair(const CMPIObjectPath* sensor, const CMPIObjectPath* other,
         const FailureTexts& withoutPath, const Visit& visit)

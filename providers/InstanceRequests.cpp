@@ -14,19 +14,19 @@ namespace {
 template <typename Object>
 void reserve(const RecordClass& served, SensorFactory& factory, std::vector<Object*>& objects)
 {
-    if (served.reservesForEachSensor)
+    if (!served.isCap)
         objects.reserve(factory.getNumberOfInstances());
 }
 
-// Says that the factory failed, where the handler ends before its result is closed.
+// Traces the failure of the factory and the exit; the result stays open.
 void giveUp(const HandlerMarks& marks, const FailureLines& lines, const char* text)
 {
     marks.failure(text, lines.message);
     marks.exit(lines.exit);
 }
 
-// The instance whose key was given. False when the handler is to end here: there is no such
-// record, which has been said in the trace.
+// Returns the instance with the key to the object manager. Returns false after it traced that there
+// is no such record; the request then ends with an open result.
 bool returnByKey(const RecordClass& served, const CMPIBroker* broker, const HandlerMarks& marks,
     const FailureLines& lines, const CMPIResult* rslt, const CMPIObjectPath* ref, CMPIString* key,
     const char** properties, CMPIStatus* status)
@@ -42,8 +42,9 @@ bool returnByKey(const RecordClass& served, const CMPIBroker* broker, const Hand
     return true;
 }
 
-// The instance whose object path equals the request's, for a path that does not give the key.
-// Always of a factory of sensors: such a path never finds capabilities. False as above.
+// Returns the instance whose object path equals the request's, for a path without the key. The
+// factory always harvests sensors, so that such a path never finds capabilities. Returns false as
+// above.
 bool returnByPath(const RecordClass& served, const CMPIBroker* broker, const HandlerMarks& marks,
     const FailureLines& lines, const CMPIResult* rslt, const CMPIObjectPath* ref,
     const char** properties, CMPIStatus* status)

@@ -1,7 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The three reading requests of a class whose instances come from the factory's records, one
-// for each record.
+// The three requests of a class that has one instance for each record of the factory.
 
 #pragma once
 
@@ -15,13 +14,12 @@
 
 namespace Vorn::SensorProfileProvider {
 
-// What one such class differs in from another.
+// The properties of such a class that its requests depend on.
 struct RecordClass {
     TraceModule module;
     const char* provider; // the component of broker trace messages
     const char* key;      // names the record by itself
     bool isCap;           // harvests capabilities, otherwise sensors
-    bool reservesForEachSensor;
 
     decltype(&SensorFactory::getAllSensorCMPIObjPaths) paths;
     decltype(&SensorFactory::getAllSensorCMPIInstances) instances;
@@ -32,7 +30,7 @@ struct RecordClass {
     const char* oneFailed;
 };
 
-// Each answers one request from its entry to its exit mark. `function` is the handler's name.
+// Each handles one request from its entry to its exit mark. `function` is the name of the handler.
 CMPIStatus enumerateInstanceNames(const RecordClass& served, const CMPIBroker* broker,
     const char* function, const EnumerationLines& lines, const CMPIResult* rslt,
     const CMPIObjectPath* ref);

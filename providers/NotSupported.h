@@ -1,7 +1,7 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The handlers that do the same for every provider: nothing is changed or queried through this
-// library, and there is nothing to clean up. They write no trace line and touch no result.
+// The handlers that are the same for every provider: changes and queries are not supported, and
+// there is nothing to clean up. They write no trace line and do not use the result.
 
 #pragma once
 

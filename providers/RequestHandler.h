@@ -1,7 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// What the request handlers of all four providers share: their marks, the reading of a key and
-// the handing over of results.
+// Functions that the handlers of all four providers share: marks, keys and results.
 
 #pragma once
 
@@ -15,11 +14,11 @@
 
 namespace Vorn::SensorProfileProvider {
 
-// A module's broker. Its factories write it while requests may run already: an object manager
-// makes an association MI when it is first asked for associations. A request reads it once.
+// The broker of a module. It is atomic since a factory may write it while requests run: an object
+// manager creates an association MI at the first request for associations. A request reads it once.
 using ModuleBroker = std::atomic<const CMPIBroker*>;
 
-// The trace points of one handler.
+// Writes the trace points of one handler.
 class HandlerMarks {
 public:
     HandlerMarks(const TraceModule& module, const char* function)
@@ -27,7 +26,7 @@ public:
     {
     }
 
-    // A line that is not given is the caller's.
+    // A line number that is not given is that of the call.
     void entry(unsigned line = __builtin_LINE()) const
     {
         markProviderEntry(module_.component, function_, module_.file, line);
@@ -50,15 +49,16 @@ private:
 
 inline constexpr const char* noKeyPassed = "At least one key should be passed";
 
-// How many keys the request's path has, 0 when it cannot say.
+// Returns the number of keys of the request's path, 0 when the path is not usable.
 CMPICount keyCountOf(const CMPIObjectPath* ref, CMPIStatus* status);
 
-// The key's string, or null when it is absent: not there, null, of another type, or without a
-// handle. Some object managers report an absent key through the status; it is OK afterwards.
+// Returns the string of a key, or null when it is absent: missing, null, of another type, or
+// without a handle. Some object managers report a missing key through the status, which is then
+// reset to OK.
 CMPIString* textKey(const CMPIObjectPath* ref, const char* name, CMPIStatus* status);
 
-// Visits as many elements as a count cut to 16 bits says. A factory holds fewer than 65,536 objects
-// of a class, so only what comes from pairs or from other providers can be more.
+// Visits as many elements as their count truncated to 16 bits. Only lists of pairs or of objects of
+// other providers can be longer: a factory has fewer than 65,536 objects of a class.
 template <typename Object, typename Visit>
 void forEachCounted(const std::vector<Object*>& objects, const Visit& visit)
 {
@@ -67,16 +67,15 @@ void forEachCounted(const std::vector<Object*>& objects, const Visit& visit)
         visit(objects.at(i));
 }
 
-// Hands over the instances in order, null ones included.
+// Returns the instances to the object manager in order, also null ones.
 void returnInstances(const CMPIResult* rslt, const std::vector<CMPIInstance*>& instances);
 
-// Hands over the paths in order, each with the namespace of the request.
+// Returns the paths to the object manager in order, each with the namespace of the request.
 void returnPaths(const CMPIResult* rslt, const CMPIObjectPath* ref,
     const std::vector<CMPIObjectPath*>& paths, CMPIStatus* status);
 
-// Hands over the first instance whose object path names the same instance as the request's path,
-// if there is one among as many as a count cut to 16 bits says. `status` goes to the broker and
-// may be null.
+// Returns the first instance whose object path equals the request's to the object manager, if it is
+// within the count truncated to 16 bits. `status` is passed on to the broker and may be null.
 void returnInstanceAt(const CMPIResult* rslt, const CMPIObjectPath* ref,
     const std::vector<CMPIInstance*>& instances, bool comparesReferences, CMPIStatus* status);
 

@@ -1,7 +1,7 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// What the files of the ZUMLO_SensorElementCapabilities provider share: each sensor (role
-// ManagedElement) is tied to each capabilities instance (role Capabilities).
+// The provider of ZUMLO_SensorElementCapabilities, which associates each sensor (role
+// ManagedElement) with each capabilities instance (role Capabilities).
 
 #pragma once
 
@@ -21,9 +21,9 @@ AssociationClass served();
 
 } // namespace ElementCapabilities
 
-// Appends every instance of the association, sensor by sensor; an instance that the broker does
-// not make is null or without a handle. Returns 0, or 1 when it failed or there are no sensors,
-// which stands in the traces alone.
+// Appends every instance of the association, sensor by sensor; an instance that the broker cannot
+// make is null or has no handle. Returns 0, or 1 when it failed or there are no sensors. Failures
+// are only traced.
 int sensorElementCapabilitiesCMPIInstances(
     const CMPIObjectPath* op, const char** properties, std::vector<CMPIInstance*>& out);
 

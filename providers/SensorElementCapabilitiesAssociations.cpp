@@ -1,7 +1,7 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// What ZUMLO_SensorElementCapabilities leads to. Each sensor has all capabilities and all
-// sensors have each of them: the source's keys do not matter.
+// Requests along ZUMLO_SensorElementCapabilities. Every sensor is associated with all capabilities,
+// so the keys of the source are not read.
 
 #include "factory/ClassNames.h"
 #include "providers/AssociationRequests.h"
@@ -13,7 +13,7 @@ using namespace ElementCapabilities;
 
 namespace {
 
-// The paths of all objects of the target's class; none where this provider knows no such class.
+// Appends the paths of all objects of the target's class, if this provider leads to it.
 FetchFailure fetchPaths(const AssociationRequest& request, SensorFactory& factory,
     const CMPIObjectPath* op, const CMPIObjectPath* target, bool leadsToSensors,
     std::vector<CMPIObjectPath*>& paths, CMPIStatus* status)
@@ -27,7 +27,7 @@ FetchFailure fetchPaths(const AssociationRequest& request, SensorFactory& factor
     return {nullptr};
 }
 
-// The same for the objects themselves. Both failures are reported alike.
+// Appends the objects themselves. Both failures have the same text.
 FetchFailure fetchInstances(const AssociationRequest& request, SensorFactory& factory,
     const CMPIObjectPath* op, const CMPIObjectPath* target, const char** properties,
     std::vector<CMPIInstance*>& instances, CMPIStatus* status)
@@ -42,8 +42,8 @@ FetchFailure fetchInstances(const AssociationRequest& request, SensorFactory& fa
     return {result ? sensorsFailed : nullptr};
 }
 
-// `withoutTarget` is the failure of a source whose class has no far end.
-CMPIStatus associators(const char* function, Answer answer, const CMPIResult* rslt,
+// `withoutTarget` is the failure text for a source whose class has no far end.
+CMPIStatus associators(const char* function, ResultKind kind, const CMPIResult* rslt,
     const CMPIObjectPath* op, const char* assocClass, const char* resultClass,
     const char** properties, const char* withoutTarget)
 {
@@ -52,7 +52,7 @@ CMPIStatus associators(const char* function, Answer answer, const CMPIResult* rs
     SensorFactory factory(true, true);
     std::vector<CMPIInstance*> instances;
     std::vector<CMPIObjectPath*> paths;
-    const bool wantsInstances = answer == Answer::instances;
+    const bool wantsInstances = kind == ResultKind::instances;
     const unsigned short count = factory.getNumberOfInstances();
     wantsInstances ? instances.reserve(count) : paths.reserve(count);
     const CMPIObjectPath* const target =
@@ -77,11 +77,11 @@ CMPIStatus associators(const char* function, Answer answer, const CMPIResult* rs
     return status;
 }
 
-CMPIStatus references(const char* function, Answer answer, const CMPIResult* rslt,
+CMPIStatus references(const char* function, ResultKind kind, const CMPIResult* rslt,
     const CMPIObjectPath* op, const char* withoutTarget)
 {
     const AssociationRequest request(served(), broker, function);
-    return request.references(answer, rslt, op, withoutTarget,
+    return request.references(kind, rslt, op, withoutTarget,
         [&](SensorFactory& factory, const CMPIObjectPath* target, bool leadsToSensors,
             std::vector<CMPIObjectPath*>& farEnds, CMPIStatus* status) {
             return fetchPaths(request, factory, op, target, leadsToSensors, farEnds, status);
@@ -94,7 +94,7 @@ CMPIStatus SensorElementCapabilities_Associators(CMPIAssociationMI*, const CMPIC
     const CMPIResult* rslt, const CMPIObjectPath* op, const char* assocClass,
     const char* resultClass, const char*, const char*, const char** properties)
 {
-    return associators("SensorElementCapabilities_Associators", Answer::instances, rslt, op,
+    return associators("SensorElementCapabilities_Associators", ResultKind::instances, rslt, op,
         assocClass, resultClass, properties, "Object Path is NULL in Associators");
 }
 
@@ -102,21 +102,21 @@ CMPIStatus SensorElementCapabilities_AssociatorNames(CMPIAssociationMI*, const C
     const CMPIResult* rslt, const CMPIObjectPath* op, const char* assocClass,
     const char* resultClass, const char*, const char*)
 {
-    return associators("SensorElementCapabilities_AssociatorNames", Answer::paths, rslt, op,
+    return associators("SensorElementCapabilities_AssociatorNames", ResultKind::paths, rslt, op,
         assocClass, resultClass, nullptr, "Object Path is NULL in AssociatorsNames");
 }
 
 CMPIStatus SensorElementCapabilities_References(CMPIAssociationMI*, const CMPIContext*,
     const CMPIResult* rslt, const CMPIObjectPath* op, const char*, const char*, const char**)
 {
-    return references("SensorElementCapabilities_References", Answer::instances, rslt, op,
+    return references("SensorElementCapabilities_References", ResultKind::instances, rslt, op,
         "Object Path is NULL in References");
 }
 
 CMPIStatus SensorElementCapabilities_ReferenceNames(CMPIAssociationMI*, const CMPIContext*,
     const CMPIResult* rslt, const CMPIObjectPath* op, const char*, const char*)
 {
-    return references("SensorElementCapabilities_ReferenceNames", Answer::paths, rslt, op,
+    return references("SensorElementCapabilities_ReferenceNames", ResultKind::paths, rslt, op,
         "Object Path is NULL in ReferenceNames");
 }
 

@@ -1,6 +1,7 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The instances of ZUMLO_SensorElementCapabilities: each sensor with each capabilities instance.
+// Requests for instances of ZUMLO_SensorElementCapabilities: each sensor with each capabilities
+// instance.
 
 #include "factory/ClassNames.h"
 #include "providers/AssociationWalk.h"
@@ -12,8 +13,7 @@ using namespace ElementCapabilities;
 
 namespace {
 
-// How the failures of a walk over all pairs are reported. The runs of blanks are part of the
-// texts.
+// The texts of failures in an iteration over all pairs. The runs of blanks are part of them.
 struct PairFailures {
     FailureTexts sensor;
     FailureTexts capabilities;
@@ -42,10 +42,10 @@ constexpr PairFailures nameFailures = {
         "Create CMPIObjectPath failed                     for ElementCapabilities"},
 };
 
-// Where a walk ended.
+// Where an iteration ended.
 enum class WalkEnd { complete, atSensors, atCapabilities, reported };
 
-// All pairs in order, sensor by sensor.
+// Iterates over all pairs, sensor by sensor.
 class PairWalk : public AssociationWalk {
 public:
     PairWalk(const AssociationRequest& request, const PairFailures& failures,
@@ -106,7 +106,7 @@ int sensorElementCapabilitiesCMPIInstances(
     CMPIStatus status = {CMPI_RC_OK, nullptr};
     PairWalk walk(request, instanceFailures, op, &status);
     walk.reserve(out);
-    // Not the names of this association's references, but what the filter has always held.
+    // The filter's keys deliberately differ from the references of this association.
     const char* keys[] = {"Antecedent", "Dependent", nullptr};
     const WalkEnd end = walk.run([&](const CMPIObjectPath* association,
                                      const References& references) {

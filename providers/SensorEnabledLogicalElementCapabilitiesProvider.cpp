@@ -26,7 +26,6 @@ RecordClass capabilities()
         .provider = SensorEnabledLogicalElementCapabilitiesProvider,
         .key = "InstanceID",
         .isCap = true,
-        .reservesForEachSensor = false,
         .paths = &SensorFactory::getAllSensorEnabledLogicalElementCapCMPIObjPaths,
         .instances = &SensorFactory::getAllSensorEnabledLogicalElementCapCMPIInstances,
         .one = &SensorFactory::getOneSensorEnabledLogicalElementCapCMPIInstance,

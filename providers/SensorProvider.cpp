@@ -24,7 +24,6 @@ RecordClass sensors()
         .provider = SensorProfileProvider,
         .key = "DeviceID",
         .isCap = false,
-        .reservesForEachSensor = true,
         .paths = &SensorFactory::getAllSensorCMPIObjPaths,
         .instances = &SensorFactory::getAllSensorCMPIInstances,
         .one = &SensorFactory::getOneSensorCMPIInstance,

@@ -1,7 +1,7 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// What the files of the ZUMLO_SensorSystemDevice provider share: each computer system that the
-// object manager knows (role GroupComponent) is tied to each sensor (role PartComponent).
+// The provider of ZUMLO_SensorSystemDevice, which associates each computer system of the object
+// manager (role GroupComponent) with each sensor (role PartComponent).
 
 #pragma once
 
@@ -21,9 +21,9 @@ AssociationClass served();
 
 } // namespace SystemDevice
 
-// Appends every instance of the association, system by system; an instance that the broker does
-// not make is null or without a handle. Returns 0, or 1 when it failed or there are no sensors
-// where there is a system, which stands in the traces alone.
+// Appends every instance of the association, system by system; an instance that the broker cannot
+// make is null or has no handle. Returns 0, or 1 when it failed or there is a system but no sensor.
+// Failures are only traced.
 int sensorSystemDeviceCMPIInstances(const CMPIObjectPath* op, const char** properties,
     const CMPIContext* ctx, std::vector<CMPIInstance*>& out);
 

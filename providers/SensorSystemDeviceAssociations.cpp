@@ -1,7 +1,7 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// What ZUMLO_SensorSystemDevice leads to. Each computer system has all sensors and all systems
-// have each of them: the source's keys do not matter. No request here closes its result.
+// Requests along ZUMLO_SensorSystemDevice. Every computer system is associated with all sensors, so
+// the keys of the source are not read. No request closes its result.
 
 #include "factory/ClassNames.h"
 #include "platform/utilities/ProviderUtilities.h"
@@ -16,20 +16,19 @@ namespace {
 
 constexpr const char* upcallFailed = "Call to CBEnumInstances of target Class Failed.";
 
-// Whether a client that named this result class wants objects of the class, or of the standard
-// class it is derived from.
+// Returns whether the result class of a request is absent, the class or its standard superclass.
 bool wants(const char* resultClass, const char* className, const char* standardClass)
 {
     return resultClass == nullptr || isSameName(resultClass, className) ||
            isSameName(resultClass, standardClass);
 }
 
-// Hands over what the object manager knows of the target's class. False when the up-call fails;
-// a failure while its answer is read stands in the status alone.
-bool returnSystems(const AssociationRequest& request, Answer answer, const CMPIContext* ctx,
+// Returns the objects of the target's class that an up-call finds. Returns false when the up-call
+// fails; a failure while its enumeration is read is only set in the status.
+bool returnSystems(const AssociationRequest& request, ResultKind kind, const CMPIContext* ctx,
     const CMPIResult* rslt, const CMPIObjectPath* target, CMPIStatus* status)
 {
-    const bool wantsInstances = answer == Answer::instances;
+    const bool wantsInstances = kind == ResultKind::instances;
     const CMPIEnumeration* const systems =
         wantsInstances ? CBEnumInstances(request.broker(), ctx, target, nullptr, status)
                        : CBEnumInstanceNames(request.broker(), ctx, target, status);
@@ -47,11 +46,12 @@ bool returnSystems(const AssociationRequest& request, Answer answer, const CMPIC
     return true;
 }
 
-// Hands over the sensors.
-FetchFailure returnSensors(const AssociationRequest& request, Answer answer, const CMPIResult* rslt,
-    const CMPIObjectPath* op, const char** properties, SensorFactory& factory, CMPIStatus* status)
+// Returns the sensors to the object manager.
+FetchFailure returnSensors(const AssociationRequest& request, ResultKind kind,
+    const CMPIResult* rslt, const CMPIObjectPath* op, const char** properties,
+    SensorFactory& factory, CMPIStatus* status)
 {
-    if (answer == Answer::instances) {
+    if (kind == ResultKind::instances) {
         std::vector<CMPIInstance*> instances;
         instances.reserve(factory.getNumberOfInstances());
         if (factory.getAllSensorCMPIInstances(
@@ -68,7 +68,7 @@ FetchFailure returnSensors(const AssociationRequest& request, Answer answer, con
     return failure;
 }
 
-CMPIStatus associators(const char* function, Answer answer, const CMPIContext* ctx,
+CMPIStatus associators(const char* function, ResultKind kind, const CMPIContext* ctx,
     const CMPIResult* rslt, const CMPIObjectPath* op, const char* assocClass,
     const char* resultClass, const char** properties)
 {
@@ -86,7 +86,7 @@ CMPIStatus associators(const char* function, Answer answer, const CMPIContext* c
     if (isOfClass(target, ComputerSystemClass, &status)) {
         if (!wants(resultClass, ComputerSystemClass, "CIM_ComputerSystem"))
             return ok; // without an exit mark
-        if (!returnSystems(request, answer, ctx, rslt, target, &status)) {
+        if (!returnSystems(request, kind, ctx, rslt, target, &status)) {
             request.marks().failure(upcallFailed);
             return status; // without an exit mark
         }
@@ -94,7 +94,7 @@ CMPIStatus associators(const char* function, Answer answer, const CMPIContext* c
         if (!wants(resultClass, SensorClass, "CIM_NumericSensor"))
             return ok; // without an exit mark
         const FetchFailure failure =
-            returnSensors(request, answer, rslt, op, properties, factory, &status);
+            returnSensors(request, kind, rslt, op, properties, factory, &status);
         if (failure.text != nullptr)
             request.marks().failure(failure.text);
     }
@@ -102,8 +102,8 @@ CMPIStatus associators(const char* function, Answer answer, const CMPIContext* c
     return status;
 }
 
-// The far ends of the source's associations, of the target's class. A failed up-call leaves the
-// exit mark out, as it does for associated objects.
+// Appends the far ends of the source's associations. After a failed up-call there is no exit mark,
+// as in requests for associated objects.
 FetchFailure fetchFarEnds(const AssociationRequest& request, const CMPIContext* ctx,
     const CMPIObjectPath* op, const CMPIObjectPath* target, bool leadsToSensors,
     SensorFactory& factory, std::vector<CMPIObjectPath*>& farEnds, CMPIStatus* status)
@@ -123,11 +123,11 @@ FetchFailure fetchFarEnds(const AssociationRequest& request, const CMPIContext* 
     return {isWhole ? nullptr : upcallFailed, isWhole};
 }
 
-CMPIStatus references(const char* function, Answer answer, const CMPIContext* ctx,
+CMPIStatus references(const char* function, ResultKind kind, const CMPIContext* ctx,
     const CMPIResult* rslt, const CMPIObjectPath* op, const char* withoutTarget)
 {
     const AssociationRequest request(served(), broker, function);
-    return request.references(answer, rslt, op, withoutTarget,
+    return request.references(kind, rslt, op, withoutTarget,
         [&](SensorFactory& factory, const CMPIObjectPath* target, bool leadsToSensors,
             std::vector<CMPIObjectPath*>& farEnds, CMPIStatus* status) {
             return fetchFarEnds(request, ctx, op, target, leadsToSensors, factory, farEnds, status);
@@ -140,7 +140,7 @@ CMPIStatus SensorSystemDevice_Associators(CMPIAssociationMI*, const CMPIContext*
     const CMPIResult* rslt, const CMPIObjectPath* op, const char* assocClass,
     const char* resultClass, const char*, const char*, const char** properties)
 {
-    return associators("SensorSystemDevice_Associators", Answer::instances, ctx, rslt, op,
+    return associators("SensorSystemDevice_Associators", ResultKind::instances, ctx, rslt, op,
         assocClass, resultClass, properties);
 }
 
@@ -148,21 +148,21 @@ CMPIStatus SensorSystemDevice_AssociatorNames(CMPIAssociationMI*, const CMPICont
     const CMPIResult* rslt, const CMPIObjectPath* op, const char* assocClass,
     const char* resultClass, const char*, const char*)
 {
-    return associators("SensorSystemDevice_AssociatorNames", Answer::paths, ctx, rslt, op,
+    return associators("SensorSystemDevice_AssociatorNames", ResultKind::paths, ctx, rslt, op,
         assocClass, resultClass, nullptr);
 }
 
 CMPIStatus SensorSystemDevice_References(CMPIAssociationMI*, const CMPIContext* ctx,
     const CMPIResult* rslt, const CMPIObjectPath* op, const char*, const char*, const char**)
 {
-    return references("SensorSystemDevice_References", Answer::instances, ctx, rslt, op,
+    return references("SensorSystemDevice_References", ResultKind::instances, ctx, rslt, op,
         "Object Path is NULL in References");
 }
 
 CMPIStatus SensorSystemDevice_ReferenceNames(CMPIAssociationMI*, const CMPIContext* ctx,
     const CMPIResult* rslt, const CMPIObjectPath* op, const char*, const char*)
 {
-    return references("SensorSystemDevice_ReferenceNames", Answer::paths, ctx, rslt, op,
+    return references("SensorSystemDevice_ReferenceNames", ResultKind::paths, ctx, rslt, op,
         "Object Path is NULL in ReferenceNames");
 }
 

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The instances of ZUMLO_SensorSystemDevice: each computer system with each sensor.
+// Requests for instances of ZUMLO_SensorSystemDevice: each computer system with each sensor.
 
 #include "factory/ClassNames.h"
 #include "providers/AssociationWalk.h"
@@ -12,8 +12,8 @@ using namespace SystemDevice;
 
 namespace {
 
-// How the failures of a walk over all pairs are reported. The runs of blanks are part of the
-// texts, and so are the classes they name.
+// The texts of failures in an iteration over all pairs. The runs of blanks are part of them, and so
+// are the classes that they name.
 struct PairFailures {
     FailureTexts system;
     FailureTexts sensor;
@@ -37,10 +37,10 @@ constexpr PairFailures nameFailures = {
         "Create CMPIObjectPath failed for                     SensorSystemDeviceClass.", nullptr},
 };
 
-// Where a walk ended.
+// Where an iteration ended.
 enum class WalkEnd { complete, withoutSystemPath, atUpcall, atSystem, atSensors, reported };
 
-// All pairs in order, system by system.
+// Iterates over all pairs, system by system.
 class PairWalk : public AssociationWalk {
 public:
     PairWalk(const AssociationRequest& request, const PairFailures& failures,
@@ -115,7 +115,7 @@ int sensorSystemDeviceCMPIInstances(const CMPIObjectPath* op, const char** prope
                                      const References& references) {
         out.push_back(newAssociation(request.broker(), association, references, properties, keys));
     });
-    // The other ends leave without an exit mark.
+    // After the other ends there is no exit mark.
     if (end == WalkEnd::complete || end == WalkEnd::withoutSystemPath)
         request.marks().exit();
     return end == WalkEnd::complete ? 0 : 1;
@@ -133,7 +133,7 @@ CMPIStatus SensorSystemDevice_EnumInstanceNames(
             CMReturnObjectPath(rslt, association);
         });
     if (end == WalkEnd::atUpcall) {
-        // Nobody serves computer systems, which is no failure of this provider.
+        // An object manager without a provider of computer systems is not a failure here.
         CMSetStatusWithChars(request.broker(), &status, CMPI_RC_OK,
             "CBEnumInstanceNames Failed for the ZUMLO_ComputerSystem");
         return status;

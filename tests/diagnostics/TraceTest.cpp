@@ -155,7 +155,7 @@ TEST(TracedOperation, marksCarryTheParameterListAtLevel3000)
 TEST(TracedOperation, plainMarksHaveLevel4000)
 {
     const LogCapture capture;
-    const PlainTracedOperation traced({Component, "F"}, "f");
+    const TracedOperation traced({Component, "F"}, "f");
     traced.entering(10);
     traced.exiting(20);
     const std::vector<LogLine> expected = {
@@ -167,7 +167,7 @@ TEST(TracedOperation, plainMarksHaveLevel4000)
 TEST(TracedOperation, aMarkWithoutALineNumberCarriesItsSourceLine)
 {
     const LogCapture capture;
-    const PlainTracedOperation traced({Component, "F"}, "f");
+    const TracedOperation traced({Component, "F"}, "f");
     traced.entering();
     const unsigned here = __LINE__ - 1;
     ASSERT_EQ(capture.log().size(), 1U);

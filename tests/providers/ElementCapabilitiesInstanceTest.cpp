@@ -279,13 +279,4 @@ TEST_F(ElementCapabilitiesOfNoSensorTest, findsNoInstance)
     EXPECT_THAT(got(pairPath(sensor("A:/1"), capabilities())), IsEmpty());
 }
 
-TEST_F(ElementCapabilitiesInstanceTest, everyNameThatIsEnumeratedCanBeFetched)
-{
-    expectOk(enumerateNames(path(Class)));
-    ASSERT_EQ(answer_.paths().size(), 3U);
-    for (const Host::ObjectPath* const name : answer_.paths())
-        EXPECT_THAT(
-            got(*name), ElementsAre(nameOf(*name->key("ManagedElement")->path()) + " " + Cap));
-}
-
 } // namespace ElementCapabilitiesInstanceTests

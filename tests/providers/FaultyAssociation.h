@@ -60,67 +60,61 @@ struct AssociationKinds {
 
     RequestKind names(const SourceMaker& ref) const
     {
-        return {"names", ref,
-            [make = instanceFactory](auto* broker, auto* context, auto* result, auto* path) {
-                CMPIInstanceMI* const mi = make(broker, nullptr, nullptr);
-                return mi->ft->enumerateInstanceNames(mi, context, result, path);
-            }};
+        return kind("names", ref, instanceFactory,
+            [](auto* mi, auto... all) { return mi->ft->enumerateInstanceNames(mi, all...); });
     }
 
     RequestKind instances(const SourceMaker& ref) const
     {
-        return {"instances", ref,
-            [make = instanceFactory](auto* broker, auto* context, auto* result, auto* path) {
-                CMPIInstanceMI* const mi = make(broker, nullptr, nullptr);
-                return mi->ft->enumerateInstances(mi, context, result, path, nullptr);
-            }};
+        return kind("instances", ref, instanceFactory,
+            [](auto* mi, auto... all) { return mi->ft->enumerateInstances(mi, all..., nullptr); });
     }
 
     RequestKind one(const std::string& name, const SourceMaker& ref) const
     {
-        return {name, ref,
-            [make = instanceFactory](auto* broker, auto* context, auto* result, auto* path) {
-                CMPIInstanceMI* const mi = make(broker, nullptr, nullptr);
-                return mi->ft->getInstance(mi, context, result, path, nullptr);
-            }};
+        return kind(name, ref, instanceFactory,
+            [](auto* mi, auto... all) { return mi->ft->getInstance(mi, all..., nullptr); });
     }
 
     RequestKind associators(const std::string& name, const SourceMaker& source) const
     {
-        return {"associatorsOf" + name, source,
-            [make = associationFactory](auto* broker, auto* context, auto* result, auto* path) {
-                CMPIAssociationMI* const mi = make(broker, nullptr, nullptr);
-                return mi->ft->associators(
-                    mi, context, result, path, nullptr, nullptr, nullptr, nullptr, nullptr);
-            }};
+        return kind("associatorsOf" + name, source, associationFactory, [](auto* mi, auto... all) {
+            return mi->ft->associators(mi, all..., nullptr, nullptr, nullptr, nullptr, nullptr);
+        });
     }
 
     RequestKind associatorNames(const std::string& name, const SourceMaker& source) const
     {
-        return {"associatorNamesOf" + name, source,
-            [make = associationFactory](auto* broker, auto* context, auto* result, auto* path) {
-                CMPIAssociationMI* const mi = make(broker, nullptr, nullptr);
-                return mi->ft->associatorNames(
-                    mi, context, result, path, nullptr, nullptr, nullptr, nullptr);
-            }};
+        return kind(
+            "associatorNamesOf" + name, source, associationFactory, [](auto* mi, auto... all) {
+                return mi->ft->associatorNames(mi, all..., nullptr, nullptr, nullptr, nullptr);
+            });
     }
 
     RequestKind references(const std::string& name, const SourceMaker& source) const
     {
-        return {"referencesOf" + name, source,
-            [make = associationFactory](auto* broker, auto* context, auto* result, auto* path) {
-                CMPIAssociationMI* const mi = make(broker, nullptr, nullptr);
-                return mi->ft->references(mi, context, result, path, nullptr, nullptr, nullptr);
-            }};
+        return kind("referencesOf" + name, source, associationFactory, [](auto* mi, auto... all) {
+            return mi->ft->references(mi, all..., nullptr, nullptr, nullptr);
+        });
     }
 
     RequestKind referenceNames(const std::string& name, const SourceMaker& source) const
     {
-        return {"referenceNamesOf" + name, source,
-            [make = associationFactory](auto* broker, auto* context, auto* result, auto* path) {
-                CMPIAssociationMI* const mi = make(broker, nullptr, nullptr);
-                return mi->ft->referenceNames(mi, context, result, path, nullptr, nullptr);
-            }};
+        return kind(
+            "referenceNamesOf" + name, source, associationFactory, [](auto* mi, auto... all) {
+                return mi->ft->referenceNames(mi, all..., nullptr, nullptr);
+            });
+    }
+
+private:
+    // A request that `call` makes through the MI of the factory.
+    template <typename Factory, typename Call>
+    static RequestKind kind(
+        const std::string& name, const SourceMaker& source, Factory make, Call call)
+    {
+        return {name, source, [=](auto* broker, auto* context, auto* result, auto* path) {
+                    return call(make(broker, nullptr, nullptr), context, result, path);
+                }};
     }
 };
 

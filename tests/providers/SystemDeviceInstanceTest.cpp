@@ -277,12 +277,4 @@ TEST_F(SystemDeviceInstanceTest, aFailedUpcallFindsNothingAndIsOk)
     EXPECT_THAT(got(pairPath(system("host"), sensor("A:/1"))), IsEmpty());
 }
 
-TEST_F(SystemDeviceInstanceTest, everyNameThatIsEnumeratedCanBeFetched)
-{
-    expectOk(enumerateNames(path(Class)));
-    ASSERT_EQ(answer_.paths().size(), 6U);
-    for (std::size_t i = 0; i < 6; ++i)
-        EXPECT_THAT(got(*answer_.paths()[i]), ElementsAre(AllPairs[i]));
-}
-
 } // namespace SystemDeviceInstanceTests

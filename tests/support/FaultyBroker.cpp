@@ -11,6 +11,7 @@
 #include "host/broker/String.h"
 #include "host/broker/Tables.h"
 
+#include <tuple>
 #include <type_traits>
 
 namespace Testing {
@@ -19,52 +20,18 @@ namespace {
 
 thread_local FaultyBroker* inForce = nullptr;
 
-// The embedded broker's table of each type, and the one with calls interposed.
+// Returns the embedded broker's table of a type.
 template <typename Table>
-const Table& realTable();
+const Table& realTable()
+{
+    return std::get<const Table&>(std::tie(Host::upcallFunctions, Host::encapsulationFunctions,
+        Host::String::functions, Host::Array::functions, Host::ObjectPath::functions,
+        Host::Instance::functions, Host::Enumeration::functions, Host::Result::functions));
+}
+
+// Returns the same table with calls interposed.
 template <typename Table>
 const Table& watchedTable();
-
-template <>
-const CMPIBrokerFT& realTable()
-{
-    return Host::upcallFunctions;
-}
-template <>
-const CMPIBrokerEncFT& realTable()
-{
-    return Host::encapsulationFunctions;
-}
-template <>
-const CMPIStringFT& realTable()
-{
-    return Host::String::functions;
-}
-template <>
-const CMPIArrayFT& realTable()
-{
-    return Host::Array::functions;
-}
-template <>
-const CMPIObjectPathFT& realTable()
-{
-    return Host::ObjectPath::functions;
-}
-template <>
-const CMPIInstanceFT& realTable()
-{
-    return Host::Instance::functions;
-}
-template <>
-const CMPIEnumerationFT& realTable()
-{
-    return Host::Enumeration::functions;
-}
-template <>
-const CMPIResultFT& realTable()
-{
-    return Host::Result::functions;
-}
 
 template <typename Handle>
 using TableOf = std::remove_const_t<std::remove_pointer_t<decltype(Handle::ft)>>;
