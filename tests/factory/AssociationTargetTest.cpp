@@ -14,12 +14,7 @@ namespace AssociationTargetTests {
 
 using Vorn::SensorProfileProvider::SensorFactory;
 using namespace ::testing;
-using Testing::BrokerCall;
-using Testing::BrokerMessage;
-using Testing::FaultManner;
-using Testing::FaultyBroker;
-using Testing::LogCapture;
-using Testing::ProviderTest;
+using namespace Testing;
 
 constexpr const char* Sensor = "ZUMLO_NumericSensor";
 constexpr const char* System = "ZUMLO_ComputerSystem";

@@ -11,17 +11,8 @@
 namespace CapabilitiesEnumerationTests {
 
 using namespace Vorn::SensorProfileProvider;
-using Testing::BrokerCall;
-using Testing::BrokerMessage;
-using Testing::describe;
-using ::testing::ElementsAre;
-using ::testing::ElementsAreArray;
-using Testing::FaultManner;
-using Testing::FaultyBroker;
-using Testing::LogCapture;
-using Testing::property;
-using Testing::ProviderTest;
-using Testing::ScriptedMachine;
+using namespace Testing;
+using namespace ::testing;
 
 constexpr const char* Class = "ZUMLO_SensorEnabledLogicalElementCapabilities";
 constexpr const char* Provider = "SensorEnabledLogicalElementCapabilitiesProvider";
@@ -221,45 +212,22 @@ TEST_F(CapabilitiesEnumerationTest, withoutAStatusAMissingPathIsToldToTheTraceAl
     EXPECT_EQ(messages_.size(), 1U);
 }
 
-// ---- Trace lines; those of the instances made on the way are left out ----
-
-std::vector<std::string> linesOf(const LogCapture& capture, const std::string& function)
-{
-    std::vector<std::string> found;
-    for (const Testing::LogLine& line : capture.log())
-        if (line.function == function)
-            found.push_back(Testing::withoutPointers(line));
-    return found;
-}
-
-std::string traced(
-    const std::string& function, const std::string& mark, int line, const std::string& parameters)
-{
-    const std::string number = std::to_string(line);
-    return function + "(SensorFactory:" + number + ") 3000 " + mark + ": " + function +
-           "() in SensorFactory [Line: " + number + "],Parameters List:  " + parameters;
-}
+// ---- Trace lines of what ends early ----
 
 TEST_F(CapabilitiesEnumerationTest, anUnknownIdentifierLeavesTheExitingLineOut)
 {
     const LogCapture capture;
     getOne("unknown");
-    const std::string name = "getOneSensorEnabledLogicalElementCapCMPIInstance";
-    EXPECT_THAT(linesOf(capture, name),
-        ElementsAre(traced(name, "ENTERING", 1134,
-            "broker=PTR ref=PTR key=PTR properties=0 instances=PTR rc=PTR")));
+    EXPECT_THAT(capture.marksOf("getOneSensorEnabledLogicalElementCapCMPIInstance"),
+        ElementsAre("ENTERING 1134"));
 }
-
-const std::string PathsOperation = "getAllSensorEnabledLogicalElementCapCMPIObjPaths";
-const std::string PathsParameters = "broker=PTR ref=PTR objectPaths=PTR status=PTR";
 
 TEST_F(NoCapabilitiesTest, haveAnExitingLineOfTheirOwn)
 {
     const LogCapture capture;
     getPaths();
-    EXPECT_THAT(linesOf(capture, PathsOperation),
-        ElementsAre(traced(PathsOperation, "ENTERING", 1041, PathsParameters),
-            traced(PathsOperation, "EXITING", 1104, PathsParameters)));
+    EXPECT_THAT(capture.marksOf("getAllSensorEnabledLogicalElementCapCMPIObjPaths"),
+        ElementsAre("ENTERING 1041", "EXITING 1104"));
 }
 
 TEST_F(CapabilitiesEnumerationTest, anObjectPathThatCannotBeMadeLeavesTheExitingLineOut)
@@ -269,8 +237,8 @@ TEST_F(CapabilitiesEnumerationTest, anObjectPathThatCannotBeMadeLeavesTheExiting
     faulty.plan({BrokerCall::newObjectPath, 1, FaultManner::nullResult});
     factory_.getAllSensorEnabledLogicalElementCapCMPIObjPaths(
         faulty.handle(), path("C").handle(), paths_, &rc_);
-    EXPECT_THAT(linesOf(capture, PathsOperation),
-        ElementsAre(traced(PathsOperation, "ENTERING", 1041, PathsParameters)));
+    EXPECT_THAT(capture.marksOf("getAllSensorEnabledLogicalElementCapCMPIObjPaths"),
+        ElementsAre("ENTERING 1041"));
 }
 
 } // namespace CapabilitiesEnumerationTests

@@ -11,16 +11,8 @@
 namespace CapabilitiesInstanceBuilderTests {
 
 using namespace Vorn::SensorProfileProvider;
-using Testing::BrokerCall;
-using Testing::BrokerMessage;
-using Testing::describe;
-using ::testing::ElementsAre;
-using Testing::FaultManner;
-using Testing::FaultyBroker;
-using Testing::LogCapture;
-using Testing::namesOf;
-using Testing::property;
-using Testing::ProviderTest;
+using namespace Testing;
+using namespace ::testing;
 
 constexpr const char* Class = "ZUMLO_SensorEnabledLogicalElementCapabilities";
 constexpr const char* Provider = "SensorEnabledLogicalElementCapabilitiesProvider";

@@ -13,11 +13,8 @@
 namespace FactoryTraceTests {
 
 using namespace Vorn::SensorProfileProvider;
-using ::testing::ElementsAre;
-using Testing::LogCapture;
-using Testing::LogLine;
-using Testing::ProviderTest;
-using Testing::ScriptedMachine;
+using namespace Testing;
+using namespace ::testing;
 
 // A parameter list as the operation's arguments print.
 template <typename... LabelsAndValues>

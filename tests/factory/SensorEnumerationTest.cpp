@@ -10,14 +10,8 @@
 namespace SensorEnumerationTests {
 
 using namespace Vorn::SensorProfileProvider;
-using Testing::BrokerMessage;
-using Testing::describe;
-using ::testing::ElementsAre;
-using Testing::LogCapture;
-using Testing::property;
-using Testing::ProviderTest;
-using Testing::ScriptedMachine;
-using Testing::ScriptedNode;
+using namespace Testing;
+using namespace ::testing;
 using Vorn::NodeReading;
 using Vorn::NodeLexicon::NodeType;
 
@@ -205,32 +199,20 @@ TEST_F(EmptyMachineTest, leavesAStatusThatWasSetAsItIs)
     EXPECT_EQ(rc_.msg, nullptr);
 }
 
-// ---- Trace lines; those of the instances made on the way are left out ----
-
-std::vector<std::string> linesOf(const LogCapture& capture, const std::string& function)
-{
-    std::vector<std::string> found;
-    for (const Testing::LogLine& line : capture.log())
-        if (line.function == function) {
-            const std::string text = Testing::withoutPointers(line);
-            found.push_back(text.substr(text.find(") ") + 2, 13) +
-                            text.substr(std::min(text.size(), text.find(",Parameters"))));
-        }
-    return found;
-}
+// ---- Trace lines of what ends early ----
 
 TEST_F(SensorEnumerationTest, anUnknownIdentifierLeavesTheExitingLineOut)
 {
     const LogCapture capture;
     getOne("unknown");
-    EXPECT_EQ(linesOf(capture, "getOneSensorCMPIInstance").size(), 1U);
+    EXPECT_EQ(capture.marksOf("getOneSensorCMPIInstance").size(), 1U);
 }
 
 TEST_F(EmptyMachineTest, hasItsObjectPathsTracedToo)
 {
     const LogCapture capture;
     factory_.getAllSensorCMPIObjPaths(broker(), path("C").handle(), paths_, &rc_);
-    EXPECT_EQ(linesOf(capture, "getAllSensorCMPIObjPaths").size(), 2U);
+    EXPECT_EQ(capture.marksOf("getAllSensorCMPIObjPaths").size(), 2U);
 }
 
 } // namespace SensorEnumerationTests

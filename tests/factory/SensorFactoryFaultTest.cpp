@@ -12,16 +12,8 @@
 namespace SensorFactoryFaultTests {
 
 using namespace Vorn::SensorProfileProvider;
-using Testing::BrokerCall;
-using Testing::BrokerMessage;
-using ::testing::ElementsAre;
-using Testing::FaultManner;
-using ::testing::IsEmpty;
-using Testing::LogCapture;
-using Testing::property;
-using Testing::ProviderTest;
-using Testing::ScriptedMachine;
-using Testing::textOf;
+using namespace Testing;
+using namespace ::testing;
 using Vorn::NodeReading;
 using Vorn::NodeLexicon::NodeType;
 
@@ -43,17 +35,6 @@ protected:
     {
         return factory_.makeSensorInstance(
             faulty_.handle(), path("C").handle(), Sensor(), properties, false, &rc_);
-    }
-
-    // Such as `EXITING 737`, of one operation.
-    static std::vector<std::string> marks(const LogCapture& capture, const std::string& function)
-    {
-        std::vector<std::string> found;
-        for (const Testing::LogLine& line : capture.log())
-            if (line.function == function)
-                found.push_back(
-                    line.text.substr(0, line.text.find(':')) + " " + std::to_string(line.line));
-        return found;
     }
 
     ScriptedMachine machine_;
@@ -105,7 +86,7 @@ TEST_P(UndeliveredTest, aFailureOfPathsHasItsExitingLine)
     faulty_.plan({BrokerCall::newObjectPath, 2, GetParam()});
     const LogCapture capture;
     makePaths(&rc_);
-    EXPECT_THAT(marks(capture, "getAllSensorCMPIObjPaths"),
+    EXPECT_THAT(capture.marksOf("getAllSensorCMPIObjPaths"),
         ElementsAre(::testing::StartsWith("ENTERING"), ::testing::StartsWith("EXITING")));
 }
 
@@ -116,7 +97,7 @@ TEST_P(UndeliveredTest, anInstanceWithoutAPathLeavesTheStatusAndHasItsExitingLin
     faulty_.plan({BrokerCall::newObjectPath, 1, GetParam()});
     const LogCapture capture;
     EXPECT_EQ(makeInstance(), nullptr);
-    EXPECT_THAT(marks(capture, "makeSensorInstance"), ElementsAre("ENTERING 269", "EXITING 737"));
+    EXPECT_THAT(capture.marksOf("makeSensorInstance"), ElementsAre("ENTERING 269", "EXITING 737"));
     EXPECT_EQ(rc_.rc, CMPI_RC_ERR_ACCESS_DENIED);
     EXPECT_EQ(rc_.msg, nullptr);
     EXPECT_THAT(messages_, IsEmpty());
@@ -127,7 +108,7 @@ TEST_P(UndeliveredTest, anInstanceThatCannotBeMadeLeavesTheStatusAndHasItsExitin
     faulty_.plan({BrokerCall::newInstance, 1, GetParam()});
     const LogCapture capture;
     EXPECT_EQ(makeInstance() == nullptr, GetParam() == FaultManner::nullResult);
-    EXPECT_THAT(marks(capture, "makeSensorInstance"), ElementsAre("ENTERING 269", "EXITING 737"));
+    EXPECT_THAT(capture.marksOf("makeSensorInstance"), ElementsAre("ENTERING 269", "EXITING 737"));
     EXPECT_EQ(rc_.rc, CMPI_RC_ERR_ACCESS_DENIED);
     EXPECT_EQ(rc_.msg, nullptr);
     EXPECT_THAT(messages_, IsEmpty());

@@ -13,11 +13,8 @@
 namespace SensorFactoryTests {
 
 using namespace Vorn::SensorProfileProvider;
-using ::testing::ElementsAre;
-using Testing::LogCapture;
-using Testing::LogLine;
-using Testing::ScriptedMachine;
-using Testing::ScriptedNode;
+using namespace Testing;
+using namespace ::testing;
 using Vorn::NodeReading;
 using Vorn::NodeLexicon::NodeType;
 

@@ -10,14 +10,8 @@
 namespace SensorInstanceBuilderTests {
 
 using namespace Vorn::SensorProfileProvider;
-using ::testing::Contains;
-using Testing::describe;
-using ::testing::ElementsAre;
-using Testing::LogCapture;
-using Testing::namesOf;
-using ::testing::Not;
-using Testing::property;
-using Testing::ProviderTest;
+using namespace Testing;
+using namespace ::testing;
 
 class SensorInstanceBuilderTest : public ProviderTest {
 protected:

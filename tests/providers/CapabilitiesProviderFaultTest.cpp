@@ -3,7 +3,7 @@
 // What becomes of a request of the capabilities class when the broker fails it.
 
 #include "tests/providers/Factories.h"
-#include "tests/providers/FaultyRequest.h"
+#include "tests/providers/FaultyAssociation.h"
 
 #include <gmock/gmock.h>
 
@@ -15,82 +15,17 @@ using namespace Testing;
 constexpr const char* Class = "ZUMLO_SensorEnabledLogicalElementCapabilities";
 constexpr const char* Provider = "SensorEnabledLogicalElementCapabilitiesProvider";
 
-CMPIInstanceMI* provider(const CMPIBroker* broker)
-{
-    return SensorEnabledLogicalElementCapabilitiesProvider_Create_InstanceMI(
-        broker, nullptr, nullptr);
-}
-
-CMPIStatus runNames(const CMPIBroker* broker, const CMPIContext* context, const CMPIResult* result,
-    const CMPIObjectPath* ref)
-{
-    CMPIInstanceMI* const mi = provider(broker);
-    return mi->ft->enumerateInstanceNames(mi, context, result, ref);
-}
-
-CMPIStatus runInstances(const CMPIBroker* broker, const CMPIContext* context,
-    const CMPIResult* result, const CMPIObjectPath* ref)
-{
-    CMPIInstanceMI* const mi = provider(broker);
-    return mi->ft->enumerateInstances(mi, context, result, ref, nullptr);
-}
-
-CMPIStatus runOne(const CMPIBroker* broker, const CMPIContext* context, const CMPIResult* result,
-    const CMPIObjectPath* ref)
-{
-    CMPIInstanceMI* const mi = provider(broker);
-    return mi->ft->getInstance(mi, context, result, ref, nullptr);
-}
-
-Host::ObjectPath& keyless(const Host::Request& request)
-{
-    return request.makePath("root/cimv2", Class);
-}
-
-std::function<Host::ObjectPath&(const Host::Request&)> keyed(const char* key)
-{
-    return [key](const Host::Request& request) -> Host::ObjectPath& {
-        Host::ObjectPath& made = keyless(request);
-        made.addKey(
-            key, Host::Value::text(request.arena(), "ZUMLO:SensorEnabledLogicalElementCap1"));
-        return made;
-    };
-}
-
-const RequestKind Names = {"names", keyless, runNames};
-const RequestKind Instances = {"instances", keyless, runInstances};
-const RequestKind OneInstance = {"oneInstance", keyed("InstanceID"), runOne};
-const RequestKind InstanceByPath = {"instanceByPath", keyed("Other"), runOne};
-const RequestKind InstanceWithoutKeys = {"instanceWithoutKeys", keyless, runOne};
+const RequestKinds Kinds = {
+    SensorEnabledLogicalElementCapabilitiesProvider_Create_InstanceMI, nullptr};
+const RequestKind Names = Kinds.names(pathMaker(Class));
+const RequestKind Instances = Kinds.instances(pathMaker(Class));
+const RequestKind OneInstance = Kinds.one(
+    "oneInstance", pathMaker(Class, "InstanceID", "ZUMLO:SensorEnabledLogicalElementCap1"));
 
 class CapabilitiesProviderFaultTest : public FaultTest {
 protected:
     ScriptedMachine machine_;
 };
-
-class CapabilitiesProviderFaultSweep : public CapabilitiesProviderFaultTest,
-                                       public ::testing::WithParamInterface<RequestKind> {};
-
-INSTANTIATE_TEST_SUITE_P(EveryRequest, CapabilitiesProviderFaultSweep,
-    ::testing::Values(Names, Instances, OneInstance, InstanceByPath, InstanceWithoutKeys),
-    ::testing::PrintToStringParamName());
-
-TEST_P(CapabilitiesProviderFaultSweep, isSurvivedAndAnswersWithNothingMadeUp)
-{
-    sweepFaults(broker_, [&](FaultyBroker& faulty) {
-        const FaultyRequest request(broker_, faulty, GetParam());
-        EXPECT_TRUE(request.status.rc == CMPI_RC_OK || request.status.rc == CMPI_RC_ERR_FAILED)
-            << request.status.rc;
-        EXPECT_LE(request.answer.paths().size(), 1U);
-        EXPECT_LE(request.answer.instances().size(), 1U);
-        for (const Host::Instance* const instance : request.answer.instances())
-            EXPECT_EQ(instance->className(), Class);
-        for (const Host::ObjectPath* const path : request.answer.paths()) {
-            EXPECT_EQ(path->className(), Class);
-            EXPECT_EQ(path->nameSpace(), "root/cimv2");
-        }
-    });
-}
 
 TEST_F(CapabilitiesProviderFaultTest, namesThatCannotBeMadeEndInTheFactorysStatusAndAnOpenResult)
 {
@@ -117,19 +52,6 @@ TEST_F(CapabilitiesProviderFaultTest, aNameThatLostItsHandleIsPassedOver)
     EXPECT_TRUE(request->answer.isDone());
 }
 
-TEST_F(CapabilitiesProviderFaultTest, anInstanceThatCannotBeMadeIsPassedOnAsItIs)
-{
-    for (const RequestKind& kind : {Instances, OneInstance})
-        for (const FaultManner manner : Undelivered)
-            for (const BrokerCall call : {BrokerCall::newInstance, BrokerCall::newObjectPath}) {
-                const auto request = run(kind, {call, 1, manner, CMPI_RC_OK});
-                EXPECT_EQ(request->status.rc, CMPI_RC_OK);
-                EXPECT_EQ(request->answer.refused(), 1U);
-                EXPECT_TRUE(request->answer.isDone());
-                EXPECT_TRUE(request->messages.empty());
-            }
-}
-
 TEST_F(CapabilitiesProviderFaultTest, aMissingArrayStandsInTheStatusBesideTheInstance)
 {
     for (const RequestKind& kind : {Instances, OneInstance}) {
@@ -144,42 +66,6 @@ TEST_F(CapabilitiesProviderFaultTest, aMissingArrayStandsInTheStatusBesideTheIns
         EXPECT_TRUE(request->answer.isDone());
         EXPECT_EQ(request->messages.size(), 1U);
     }
-}
-
-TEST_F(CapabilitiesProviderFaultTest, aKeyReportedMissingThroughTheStatusIsAbsentAndTheAnswerIsOk)
-{
-    for (const FaultManner manner : Undelivered) {
-        const auto request =
-            run(OneInstance, {BrokerCall::getKey, 1, manner, CMPI_RC_ERR_NO_SUCH_PROPERTY});
-        EXPECT_EQ(request->status.rc, CMPI_RC_OK);
-        EXPECT_EQ(request->status.msg, nullptr);
-        EXPECT_TRUE(request->answer.instances().empty());
-        EXPECT_TRUE(request->answer.isDone());
-    }
-}
-
-TEST_F(CapabilitiesProviderFaultTest, theFilterIsSetBeforeTheProperties)
-{
-    run(OneInstance, {BrokerCall::setPropertyFilter, 1, FaultManner::errorStatus});
-    const std::vector<BrokerCall>& calls = faulty_->calls();
-    EXPECT_LT(std::find(calls.begin(), calls.end(), BrokerCall::setPropertyFilter),
-        std::find(calls.begin(), calls.end(), BrokerCall::setProperty));
-}
-
-TEST_F(CapabilitiesProviderFaultTest, aPathThatCannotCountItsKeysHasNone)
-{
-    const auto request = run(OneInstance, {BrokerCall::getKeyCount, 1, FaultManner::nullResult});
-    EXPECT_EQ(request->status.rc, CMPI_RC_ERR_FAILED);
-    EXPECT_EQ(request->message(), "At least one key should be passed");
-    EXPECT_TRUE(request->answer.isDone());
-}
-
-TEST_F(CapabilitiesProviderFaultTest, aFailureWhoseMessageCannotBeMadeHasNone)
-{
-    const auto request =
-        run(InstanceWithoutKeys, {BrokerCall::newString, 1, FaultManner::nullResult});
-    EXPECT_EQ(request->status.rc, CMPI_RC_ERR_FAILED);
-    EXPECT_EQ(request->status.msg, nullptr);
 }
 
 } // namespace CapabilitiesProviderFaultTests

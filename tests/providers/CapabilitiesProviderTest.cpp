@@ -9,12 +9,8 @@
 
 namespace CapabilitiesProviderTests {
 
-using Testing::BrokerMessage;
-using Testing::describe;
-using ::testing::ElementsAre;
-using Testing::InstanceRequestsTest;
-using Testing::namesOf;
-using Testing::ScriptedMachine;
+using namespace Testing;
+using namespace ::testing;
 using Vorn::NodeReading;
 using Vorn::NodeLexicon::NodeType;
 
@@ -118,73 +114,7 @@ TEST_F(CapabilitiesProviderTest, anInstanceIsFoundByItsIdentifier)
     EXPECT_TRUE(messages_.empty());
 }
 
-TEST_F(CapabilitiesProviderTest, theOtherKeysAndTheLetterCaseOfTheNamesDoNotMatter)
-{
-    expectOk(get(path("zumlo_sensorenabledlogicalelementcapabilities",
-        {{"Other", "x"}, {"instanceid", Identifier}})));
-    EXPECT_EQ(answer_.instances().size(), 1U);
-    EXPECT_TRUE(answer_.isDone());
-}
-
-TEST_F(CapabilitiesProviderTest, anUnknownIdentifierIsAnOpenEmptyAnswer)
-{
-    for (const char* const unknown : {"zumlo:sensorenabledlogicalelementcap1", "", "other",
-             "ZUMLO:SensorEnabledLogicalElementCap2", "ZUMLO:SensorEnabledLogicalElementCap1 "})
-        expectOk(get({{"InstanceID", unknown}}));
-    expectNothing(false);
-}
-
-TEST_F(CapabilitiesProviderTest, aPathWithoutKeysIsRefusedInAClosedResult)
-{
-    const CMPIStatus status = get(path(Class));
-    EXPECT_EQ(status.rc, CMPI_RC_ERR_FAILED);
-    EXPECT_EQ(Testing::textOf(status.msg), NoKeyText);
-    EXPECT_THAT(messages_, ElementsAre(BrokerMessage{2, Provider, NoKeyText}));
-    EXPECT_TRUE(answer_.instances().empty());
-    EXPECT_TRUE(answer_.isDone());
-}
-
-TEST_F(CapabilitiesProviderTest, aRefusalHasNoMessageWithoutABroker)
-{
-    SensorEnabledLogicalElementCapabilitiesProvider_Create_InstanceMI(nullptr, nullptr, nullptr);
-    const CMPIStatus status = get(path(Class));
-    EXPECT_EQ(status.rc, CMPI_RC_ERR_FAILED);
-    EXPECT_EQ(status.msg, nullptr);
-    EXPECT_TRUE(answer_.isDone());
-}
-
-TEST_F(CapabilitiesProviderTest, aRequestWithoutAPathIsRefused)
-{
-    const CMPIObjectPath handleless = {nullptr, &Host::ObjectPath::functions};
-    const CMPIStatus status = mi_->ft->getInstance(mi_, context(), result(), &handleless, nullptr);
-    EXPECT_EQ(status.rc, CMPI_RC_ERR_FAILED);
-    EXPECT_EQ(Testing::textOf(status.msg), NoKeyText);
-}
-
 // ---- A key that is no text: nothing is found, though the machine has a sensor ----
-
-TEST_F(CapabilitiesProviderTest, keysWithoutAnIdentifierAreAClosedEmptyAnswer)
-{
-    expectOk(get({{"Other", "x"}}));
-    expectNothing(true);
-}
-
-TEST_F(CapabilitiesProviderTest, anIdentifierOfAnotherTypeCountsAsAbsent)
-{
-    Host::ObjectPath& inner = path(Class, {{"InstanceID", Identifier}});
-    for (const Host::Value& value : {Host::Value::integer(CMPI_uint64, 7),
-             Host::Value::integer(CMPI_sint64, 7), Host::Value::boolean(true),
-             Host::Value::of(inner), Host::Value::null(CMPI_string), Host::Value::absent()}) {
-        Host::ObjectPath& ref = path(Class);
-        ref.addKey("InstanceID", value);
-        Host::CollectedResult found;
-        Host::Result into(found);
-        expectOk(mi_->ft->getInstance(mi_, context(), into.handle(), ref.handle(), nullptr));
-        EXPECT_TRUE(found.instances().empty());
-        EXPECT_TRUE(found.isDone());
-    }
-    EXPECT_TRUE(messages_.empty());
-}
 
 TEST_F(CapabilitiesProviderTest, aSensorsOwnPathFindsNothingHere)
 {
@@ -193,34 +123,6 @@ TEST_F(CapabilitiesProviderTest, aSensorsOwnPathFindsNothingHere)
         {{"CreationClassName", "ZUMLO_NumericSensor"}, {"DeviceID", "Fan:/f"},
             {"SystemCreationClassName", "ZUMLO_ComputerSystem"}, {"SystemName", systemName_}})));
     expectNothing(true);
-}
-
-// ---- Round trip and factory ----
-
-TEST_F(CapabilitiesProviderTest, theNameThatIsEnumeratedCanBeFetched)
-{
-    broker_.setClassInformation(&Testing::profileClasses());
-    expectOk(enumerateNames());
-    ASSERT_EQ(answer_.paths().size(), 1U);
-    Host::CollectedResult fetched;
-    Host::Result into(fetched);
-    expectOk(
-        mi_->ft->getInstance(mi_, context(), into.handle(), answer_.paths()[0]->handle(), nullptr));
-    ASSERT_EQ(fetched.instances().size(), 1U);
-    EXPECT_EQ(fetched.instances()[0]->objectPath().toText(), answer_.paths()[0]->toText());
-}
-
-TEST_F(CapabilitiesProviderTest, theBrokerOfTheLastFactoryCallIsUsed)
-{
-    Host::Broker other;
-    std::vector<std::string> seen;
-    other.setTraceObserver(
-        [&](const Host::TraceMessage& message) { seen.emplace_back(message.text); });
-    SensorEnabledLogicalElementCapabilitiesProvider_Create_InstanceMI(
-        other.handle(), nullptr, nullptr);
-    get(path(Class));
-    EXPECT_THAT(seen, ElementsAre(NoKeyText));
-    EXPECT_TRUE(messages_.empty());
 }
 
 } // namespace CapabilitiesProviderTests

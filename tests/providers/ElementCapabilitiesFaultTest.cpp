@@ -11,9 +11,7 @@
 namespace ElementCapabilitiesFaultTests {
 
 using namespace Testing;
-using ::testing::ElementsAre;
-using ::testing::ElementsAreArray;
-using ::testing::IsEmpty;
+using namespace ::testing;
 
 constexpr const char* Class = "ZUMLO_SensorElementCapabilities";
 constexpr const char* CapabilitiesClass = "ZUMLO_SensorEnabledLogicalElementCapabilities";
@@ -21,7 +19,7 @@ constexpr const char* Provider = "SensorElementCapabilitiesProvider";
 constexpr const char* CapabilitiesProvider = "SensorEnabledLogicalElementCapabilitiesProvider";
 const std::string Gap(21, ' ');
 
-const AssociationKinds Kinds = {SensorElementCapabilitiesProvider_Create_InstanceMI,
+const RequestKinds Kinds = {SensorElementCapabilitiesProvider_Create_InstanceMI,
     SensorElementCapabilitiesProvider_Create_AssociationMI};
 const SourceMaker Keyless = pathMaker(Class);
 const SourceMaker Sensor = sensorMaker("B:/2");

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// All requests to an association provider, for a broker that fails them.
+// Requests to a provider, for a broker that fails them.
 
 #pragma once
 
@@ -54,7 +54,7 @@ inline SourceMaker sensorMaker(const std::string& deviceID)
 }
 
 // The kinds of requests to the provider with these factories.
-struct AssociationKinds {
+struct RequestKinds {
     CMPIInstanceMI* (*instanceFactory)(const CMPIBroker*, const CMPIContext*, CMPIStatus*);
     CMPIAssociationMI* (*associationFactory)(const CMPIBroker*, const CMPIContext*, CMPIStatus*);
 

@@ -11,12 +11,8 @@
 
 namespace ProviderLifeTests {
 
-using ::testing::Each;
-using ::testing::IsEmpty;
-using Testing::LogCapture;
-using ::testing::Not;
-using Testing::ProviderTest;
-using Testing::ScriptedMachine;
+using namespace Testing;
+using namespace ::testing;
 using Vorn::NodeReading;
 using Vorn::NodeLexicon::NodeType;
 

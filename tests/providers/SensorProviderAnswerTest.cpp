@@ -15,19 +15,8 @@
 
 namespace SensorProviderAnswerTests {
 
-using Testing::BrokerCall;
-using Testing::ClosingSink;
-using ::testing::Contains;
-using ::testing::ElementsAre;
-using Testing::FaultManner;
-using Testing::isExitMark;
-using Testing::LogCapture;
-using Testing::LogLine;
-using ::testing::Not;
-using Testing::property;
-using Testing::ProviderTest;
-using Testing::ScriptedMachine;
-using Testing::ScriptedNode;
+using namespace Testing;
+using namespace ::testing;
 using Vorn::NodeReading;
 using Vorn::NodeLexicon::NodeType;
 

@@ -8,14 +8,8 @@
 
 namespace SensorProviderTests {
 
-using Testing::BrokerMessage;
-using ::testing::ElementsAre;
-using Testing::InstanceRequestsTest;
-using ::testing::IsEmpty;
-using Testing::LogCapture;
-using Testing::property;
-using Testing::ScriptedMachine;
-using Testing::ScriptedNode;
+using namespace Testing;
+using namespace ::testing;
 using Vorn::NodeReading;
 using Vorn::NodeLexicon::NodeType;
 
@@ -137,34 +131,6 @@ TEST_F(SensorProviderTest, anInstanceHasTheListedProperties)
     EXPECT_EQ(answer_.instances()[0]->properties().size(), 5U);
 }
 
-TEST_F(SensorProviderTest, anUnknownDeviceIDIsAnOpenEmptyAnswer)
-{
-    for (const char* const unknown : {"cpu:/p/b", "CPU:/p/b ", "", "other"})
-        expectOk(get({{"DeviceID", unknown}}));
-    EXPECT_TRUE(answer_.instances().empty());
-    EXPECT_FALSE(answer_.isDone());
-    EXPECT_TRUE(messages_.empty());
-}
-
-TEST_F(SensorProviderTest, aPathWithoutKeysIsRefusedInAClosedResult)
-{
-    const CMPIStatus status = get(path(Class));
-    EXPECT_EQ(status.rc, CMPI_RC_ERR_FAILED);
-    EXPECT_EQ(Testing::textOf(status.msg), NoKeyText);
-    EXPECT_THAT(messages_, ElementsAre(BrokerMessage{2, "SensorProfileProvider", NoKeyText}));
-    EXPECT_TRUE(answer_.instances().empty());
-    EXPECT_TRUE(answer_.isDone());
-}
-
-TEST_F(SensorProviderTest, aRefusalHasNoMessageWithoutABroker)
-{
-    SensorProfileProvider_Create_InstanceMI(nullptr, nullptr, nullptr);
-    const CMPIStatus status = get(path(Class));
-    EXPECT_EQ(status.rc, CMPI_RC_ERR_FAILED);
-    EXPECT_EQ(status.msg, nullptr);
-    EXPECT_TRUE(messages_.empty());
-}
-
 TEST_F(SensorProviderTest, aPathWithoutADeviceIDEqualsThatOfNoInstance)
 {
     // The path of an instance has all four keys, so no path without a device identifier
@@ -173,59 +139,6 @@ TEST_F(SensorProviderTest, aPathWithoutADeviceIDEqualsThatOfNoInstance)
         {"SystemName", systemName_}}));
     EXPECT_TRUE(answer_.instances().empty());
     EXPECT_TRUE(answer_.isDone());
-}
-
-TEST_F(SensorProviderTest, keysThatMatchNothingAreAClosedEmptyAnswer)
-{
-    expectOk(get({{"Other", "x"}}));
-    EXPECT_TRUE(answer_.instances().empty());
-    EXPECT_TRUE(answer_.isDone());
-}
-
-TEST_F(SensorProviderTest, aDeviceIDOfAnotherTypeCountsAsAbsent)
-{
-    Host::ObjectPath& ref = path(Class);
-    ref.addKey("DeviceID", Host::Value::integer(CMPI_uint64, 7));
-    expectOk(get(ref));
-    EXPECT_TRUE(answer_.instances().empty());
-    EXPECT_TRUE(answer_.isDone());
-}
-
-// Some object managers list every key of the class, those a client left out as null ones.
-TEST_F(SensorProviderTest, aNullDeviceIDCountsAsAbsent)
-{
-    Host::ObjectPath& ref = path(Class, {{"SystemName", systemName_}});
-    ref.addKey("DeviceID", Host::Value::absent());
-    expectOk(get(ref));
-    EXPECT_TRUE(answer_.isDone());
-}
-
-// ---- Round trip ----
-
-TEST_F(SensorProviderTest, everyNameThatIsEnumeratedCanBeFetched)
-{
-    expectOk(enumerateNames());
-    for (const Host::ObjectPath* const name : answer_.paths()) {
-        Host::CollectedResult fetched;
-        Host::Result into(fetched);
-        mi_->ft->getInstance(mi_, context(), into.handle(), name->handle(), nullptr);
-        ASSERT_EQ(fetched.instances().size(), 1U);
-        EXPECT_EQ(fetched.instances()[0]->objectPath().toText(), name->toText());
-    }
-}
-
-// ---- Factories ----
-
-TEST_F(SensorProviderTest, theBrokerOfTheLastFactoryCallIsUsed)
-{
-    Host::Broker other;
-    std::vector<std::string> seen;
-    other.setTraceObserver(
-        [&](const Host::TraceMessage& message) { seen.emplace_back(message.text); });
-    SensorProfileProvider_Create_InstanceMI(other.handle(), nullptr, nullptr);
-    get(path(Class));
-    EXPECT_THAT(seen, ElementsAre(NoKeyText));
-    EXPECT_TRUE(messages_.empty());
 }
 
 } // namespace SensorProviderTests

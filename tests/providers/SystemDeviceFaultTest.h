@@ -16,7 +16,7 @@ inline constexpr const char* Class = "ZUMLO_SensorSystemDevice";
 inline constexpr const char* GroupClass = "ZUMLO_ComputerSystem";
 inline constexpr const char* Provider = "SensorSystemDeviceProvider";
 
-inline const AssociationKinds Kinds = {
+inline const RequestKinds Kinds = {
     SensorSystemDeviceProvider_Create_InstanceMI, SensorSystemDeviceProvider_Create_AssociationMI};
 inline const SourceMaker Keyless = pathMaker(Class);
 inline const SourceMaker Sensor = sensorMaker("B:/2");

@@ -10,9 +10,7 @@ namespace SystemDeviceInstanceFaultTests {
 
 using namespace Testing;
 using namespace Testing::SystemDevice;
-using ::testing::ElementsAre;
-using ::testing::ElementsAreArray;
-using ::testing::IsEmpty;
+using namespace ::testing;
 
 const std::string Gap(21, ' ');
 

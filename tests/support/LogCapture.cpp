@@ -43,4 +43,14 @@ std::vector<LogLine> LogCapture::lines(const char* channel) const
     return found;
 }
 
+std::vector<std::string> LogCapture::marksOf(const std::string& function) const
+{
+    std::vector<std::string> marks;
+    for (const LogLine& line : log())
+        if (line.function == function)
+            marks.push_back(
+                line.text.substr(0, line.text.find(':')) + " " + std::to_string(line.line));
+    return marks;
+}
+
 } // namespace Testing

@@ -49,6 +49,9 @@ public:
     std::vector<LogLine> log() const { return lines("log"); }
     std::vector<LogLine> trace() const { return lines("trace"); }
 
+    // The kinds and line numbers of a function's log lines, such as `EXITING 737`.
+    std::vector<std::string> marksOf(const std::string& function) const;
+
 private:
     std::filesystem::path path(const char* channel) const { return folder_.path() / channel; }
 
