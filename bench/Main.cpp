@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-#include "platform/logging/Configuration.h"
+#include "platform/logging/LogSettings.h"
 
 #include <benchmark/benchmark.h>
 

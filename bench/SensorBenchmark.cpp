@@ -12,7 +12,7 @@
 #include "host/broker/Request.h"
 #include "host/broker/Result.h"
 #include "model/SensorHarvest.h"
-#include "platform/logging/Configuration.h"
+#include "platform/logging/LogSettings.h"
 #include "tests/providers/Factories.h"
 
 #include <benchmark/benchmark.h>
@@ -103,7 +103,7 @@ void Building(benchmark::State& state)
 
 const std::string Component = "Nimbrel.Bench";
 
-void TracePoint(benchmark::State& state, const RynLog::Configuration& configuration)
+void TracePoint(benchmark::State& state, const RynLog::LogSettings& configuration)
 {
     RynLog::configure(configuration);
     const int object = 0;

@@ -30,7 +30,7 @@ const char* nameSpaceOf(const CMPIObjectPath* ref)
     return isUsable(nameSpace) ? nameSpace->ft->getCharPtr(nameSpace, nullptr) : nullptr;
 }
 
-// A broker may lose an object at any call: each is tested before each use.
+// Any call of the broker may return an unusable object: each is tested before each use.
 
 bool addKey(const CMPIObjectPath* path, const char* name, const char* text)
 {
@@ -48,7 +48,7 @@ void setCode(const CMPIInstance* instance, const char* name, std::uint16_t code)
         CMSetProperty(instance, name, &code, CMPI_uint16);
 }
 
-// An array of one element; the property is left out when there is no array with that element.
+// Sets an array of one element; the property is left out when the broker fails to make the array.
 void setList(const CMPIBroker* broker, const CMPIInstance* instance, const char* name,
     const void* element, CMPIType type)
 {

@@ -1,7 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The path and the instance of a computer system, made through the broker. What a broker fails
-// to deliver is never used; what is made belongs to the broker.
+// The path and the instance of a computer system, made through the broker, which owns them.
 
 #pragma once
 
@@ -14,19 +13,21 @@ namespace Vorn::Companion {
 
 inline constexpr const char* ComputerSystemClass = "ZUMLO_ComputerSystem";
 
-// Neither null nor without a handle.
+// Returns whether the object is neither null nor without a handle.
 template <typename Object>
 bool isUsable(const Object* object)
 {
     return object != nullptr && object->hdl != nullptr;
 }
 
-// In the namespace of `ref`, with this computer as host. Null when it cannot be made whole.
+// Returns a path in the namespace of `ref` with this computer as host; null when the broker fails
+// to make it with its keys.
 CMPIObjectPath* makePath(
     const CMPIBroker* broker, const CMPIObjectPath* ref, const ComputerSystem& system);
 
-// With the keys and, of the other properties, those in the list (all when it is null). A
-// property that the broker refuses is not there. Null when there is no instance with its keys.
+// Returns an instance with the keys and, of the other properties, those in the list (all when it is
+// null), without properties that the broker refuses. Null when the broker fails to make an instance
+// with its keys.
 CMPIInstance* makeInstance(const CMPIBroker* broker, const CMPIObjectPath* path,
     const ComputerSystem& system, const char** properties);
 

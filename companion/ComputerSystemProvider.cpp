@@ -20,15 +20,14 @@ std::atomic<const CMPIBroker*> theBroker = nullptr;
 constexpr CMPIStatus OkStatus = {CMPI_RC_OK, nullptr};
 constexpr CMPIStatus NotSupported = {CMPI_RC_ERR_NOT_SUPPORTED, nullptr};
 
-// With the message, where the broker makes one.
+// Returns the status with a message, or without one where the broker fails to make it.
 CMPIStatus failure(const CMPIBroker* broker, CMPIrc code, const char* message)
 {
     CMPIString* const string = CMNewString(broker, message, nullptr);
     return {code, isUsable(string) ? string : nullptr};
 }
 
-// Makes the path of this computer and passes it on. What stands in the way becomes a status,
-// exceptions included: an object manager knows none.
+// Calls `work` with this computer and its path. Exceptions become a status, since CMPI has none.
 template <typename Work>
 CMPIStatus serve(const CMPIObjectPath* ref, const Work& work)
 {
@@ -44,7 +43,7 @@ CMPIStatus serve(const CMPIObjectPath* ref, const Work& work)
     }
 }
 
-// Closes the result unless what was delivered to it was refused.
+// Completes the result unless a delivery to it failed.
 CMPIStatus closed(const CMPIResult* result, const CMPIStatus& delivery)
 {
     return delivery.rc == CMPI_RC_OK ? CMReturnDone(result) : delivery;
@@ -91,8 +90,6 @@ CMPIStatus ComputerSystem_GetInstance(CMPIInstanceMI*, const CMPIContext*, const
             return returnInstance(broker, result, system, path, properties);
         });
 }
-
-// The computer is as it is: nothing is written or queried through this provider.
 
 CMPIStatus ComputerSystem_CreateInstance(CMPIInstanceMI*, const CMPIContext*, const CMPIResult*,
     const CMPIObjectPath*, const CMPIInstance*)

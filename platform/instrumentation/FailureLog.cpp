@@ -10,9 +10,9 @@ namespace Vorn {
 
 namespace {
 
-// Entries come from the environment and are few; the bound keeps a process that changes its
-// environment without end from growing.
-constexpr std::size_t mostEntries = 64;
+// Entries come from the environment and are few; the bound is for a process that changes its
+// environment again and again.
+constexpr std::size_t maximumEntries = 64;
 
 bool isKnown(const std::map<SourceStep, std::string>& reasons, const std::string& reason)
 {
@@ -31,7 +31,7 @@ FailureLog& FailureLog::instance()
 void FailureLog::failed(const std::string& entry, SourceStep step, const std::string& reason)
 {
     const std::lock_guard lock(mutex_);
-    if (reasonsByEntry_.size() >= mostEntries && !reasonsByEntry_.contains(entry))
+    if (reasonsByEntry_.size() >= maximumEntries && !reasonsByEntry_.contains(entry))
         reasonsByEntry_.clear();
     auto& reasons = reasonsByEntry_[entry];
     const bool isNew = !isKnown(reasons, reason);

@@ -1,7 +1,5 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Reports a source that cannot be used once on the log channel, not once per request.
-
 #pragma once
 
 #include "platform/instrumentation/NodeLexicon.h"
@@ -14,7 +12,7 @@
 namespace Vorn {
 
 // One step of using a source. A step has failed until the same step succeeds, so that a source
-// which fails for one node type only is not taken for mended when the next type is listed.
+// which fails for one node type only is not taken for usable when the next type is listed.
 struct SourceStep {
     enum class Stage { Configuring, Opening, Listing, Reading } stage;
     NodeLexicon::NodeType type{}; // for Listing and Reading
@@ -22,16 +20,16 @@ struct SourceStep {
     auto operator<=>(const SourceStep&) const = default;
 };
 
-// All functions may be called from any thread.
+// Reports a source that cannot be used once on the log channel, not once per request. Thread-safe.
 class FailureLog {
 public:
-    // The record of this process.
+    // Returns the record of this process.
     static FailureLog& instance();
 
     // Writes a line, unless a step of this entry is on record with the same reason.
     void failed(const std::string& entry, SourceStep step, const std::string& reason);
 
-    // Takes the step off the record: a new failure is reported again.
+    // Removes the step from the record: its next failure is reported again.
     void succeeded(const std::string& entry, SourceStep step);
 
 private:

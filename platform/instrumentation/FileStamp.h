@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// What tells one state of a file from another without reading it.
+// Identity, size and times of a file, which differ from one of its states to the next.
 
 #pragma once
 

@@ -20,7 +20,7 @@ using NodeLexicon::Properties;
 
 namespace {
 
-// What serves a process whose settings name no source.
+// The sources of a process whose settings name none.
 constexpr const char* defaultSources = "hwmon";
 
 std::string sourceListFromEnvironment()
@@ -29,7 +29,7 @@ std::string sourceListFromEnvironment()
     return value == nullptr || *value == '\0' ? defaultSources : value;
 }
 
-// Runs one step of using a source and keeps the record of what was reported up to date.
+// Runs one step of using a source and records whether it failed.
 template <typename Action>
 auto attempt(const std::string& entry, SourceStep step, const Action& action)
 {
@@ -88,13 +88,13 @@ struct Instrumentation::State {
     NodeType type{};
     std::size_t place = 0;              // the source of the node under the cursor
     std::size_t index = 0;              // the node's place among those of its source
-    std::optional<NodeReading> reading; // of the node under the cursor, once it was asked
+    std::optional<NodeReading> reading; // of the node under the cursor, once it was read
 
     State();
     void select(NodeType selected);
     void advance();
     void passFinishedSources();
-    bool standsOnNode() const { return place < sources.size(); }
+    bool isOnNode() const { return place < sources.size(); }
     const Node& node() const { return sources.at(place).nodes.at(index); }
     const NodeReading& visit();
 };
@@ -114,7 +114,7 @@ Instrumentation::State::State()
 
 void Instrumentation::State::select(NodeType selected)
 {
-    place = sources.size(); // on nothing, should a source fail
+    place = sources.size(); // past the last node, should a source fail
     reading.reset();
     type = selected;
     for (OpenSource& open : sources)
@@ -134,7 +134,7 @@ void Instrumentation::State::advance()
 
 void Instrumentation::State::passFinishedSources()
 {
-    for (; standsOnNode() && index >= sources[place].nodes.size(); ++place, index = 0)
+    for (; isOnNode() && index >= sources[place].nodes.size(); ++place, index = 0)
         // Only a walk to the end shows that every node can be read.
         FailureLog::instance().succeeded(sources[place].entry, {SourceStep::Stage::Reading, type});
 }
@@ -164,7 +164,7 @@ void Instrumentation::selectNode(NodeType type)
 
 Instrumentation::operator bool() const noexcept
 {
-    return state_->standsOnNode();
+    return state_->isOnNode();
 }
 
 Instrumentation& Instrumentation::operator++()

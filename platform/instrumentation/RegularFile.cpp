@@ -53,7 +53,7 @@ FileStamp stampOfRegular(const struct stat& status)
     throw std::runtime_error("Larger than " + std::to_string(limit) + " bytes");
 }
 
-// Up to the end of the file, which may have grown since its size was asked.
+// Reads to the end of the file, which may have grown since its size was read.
 std::string readToEnd(const Descriptor& file, std::size_t expected, std::size_t limit)
 {
     std::string text;

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Reads regular files and nothing else: a pipe or a device could block or be disturbed.
+// Reads regular files and nothing else: reading a pipe or a device could block or have effects.
 
 #pragma once
 
@@ -21,8 +21,8 @@ struct FileContent {
 FileStamp stampOfRegularFile(const std::string& path);
 FileContent readRegularFile(const std::string& path, std::size_t limit);
 
-// Whether the file is sure to get another stamp when it is written again. One that changed
-// a moment ago might not: the kernel's file times move in ticks of some milliseconds.
+// Returns whether the file will get another stamp when it is written again. One that changed a
+// moment ago might not: the kernel's file times advance in ticks of some milliseconds.
 bool isSettled(const FileStamp& stamp);
 
 } // namespace Vorn

@@ -1,7 +1,5 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Message lines of this room on the log channel.
-
 #pragma once
 
 #include "platform/logging/RynLogger.h"
@@ -12,8 +10,8 @@ namespace Vorn {
 
 constexpr int messageLevel = 6000;
 
-// `module` is the name of the calling file without folder and extension. The defaults are
-// those of the place that calls.
+// Writes a line to the log channel. `module` is the name of the calling file without folder and
+// extension. The defaults are those of the place that calls.
 inline void report(const char* module, const std::string& text,
     const char* function = __builtin_FUNCTION(),
     unsigned line = static_cast<unsigned>(__builtin_LINE())) noexcept

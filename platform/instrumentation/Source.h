@@ -1,7 +1,7 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Where sensor nodes come from. A source reads one kind of hardware description (the kernel's
-// hwmon interface, a model file); Vorn::Instrumentation walks the nodes of all of them.
+// The interface of what Vorn::Instrumentation reads: a source lists and reads the sensor nodes of
+// one kind of hardware description, the kernel's hwmon interface or a model file.
 
 #pragma once
 
@@ -22,7 +22,7 @@ struct Node {
     std::size_t token = 0;   // the source's own; names the node when it is read
 };
 
-// What one node says when it is asked. A value the node does not have is absent.
+// The status and the values of one node at one moment. A value the node does not have is absent.
 struct NodeReading {
     unsigned status = 0; // a node status code; 0 when the node reports none
     std::optional<double> reading = {};
@@ -38,18 +38,18 @@ struct NodeReading {
     bool operator==(const NodeReading&) const = default;
 };
 
-// A source belongs to one cursor and is used by one thread at a time; whatever a
-// source shares between its objects it guards itself.
+// Belongs to one cursor and is used by one thread at a time; state that objects of a source share
+// is synchronised by the source.
 class Source {
 public:
     virtual ~Source() = default;
 
-    // The nodes of one type, in the source's own order.
+    // Returns the nodes of one type, in the source's own order.
     // Throws std::runtime_error naming the file, line or chip when it cannot be used.
     virtual std::vector<Node> nodes(NodeLexicon::NodeType type) = 0;
 
-    // A fresh reading of a node that nodes() of this object returned. A value that cannot be
-    // read now is absent, never stale.
+    // Reads a node that nodes() of this object returned. A value that cannot be read now is absent,
+    // never an earlier one.
     virtual NodeReading read(const Node& node) = 0;
 };
 

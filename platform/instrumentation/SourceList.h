@@ -12,7 +12,7 @@
 namespace Vorn {
 
 struct SourceEntry {
-    std::string text; // as it stands in the list
+    std::string text; // as it is in the list
     std::string scheme;
     std::string argument; // empty when there is none
 };
@@ -20,7 +20,7 @@ struct SourceEntry {
 // Throws std::runtime_error naming the entry that is empty or ends in a lone backslash.
 std::vector<SourceEntry> parseSourceList(const std::string& list);
 
-// The entry that parseSourceList() reads back as this scheme and argument.
+// Returns the entry that parseSourceList() reads back as this scheme and argument.
 std::string formatSourceEntry(const std::string& scheme, const std::string& argument);
 
 } // namespace Vorn

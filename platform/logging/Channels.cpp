@@ -37,7 +37,7 @@ std::unique_ptr<spdlog::logger> makeLogger(const SinkSetting& setting)
 constexpr long long nothingWanted = std::numeric_limits<long long>::max();
 constexpr long long notConfigured = std::numeric_limits<long long>::min();
 
-// What stays usable while the library is unloaded or the process ends: threads may still log.
+// These stay usable while the library is unloaded or the process ends: threads may still log.
 constinit std::atomic<long long> wantedLevel{notConfigured};
 constinit std::mutex guard; // of all below
 constinit bool unloading = false;
@@ -72,9 +72,9 @@ void install(std::shared_ptr<const Channels> channels)
 // REQUIRES: the guard is held.
 void configureAtFirstUse()
 {
-    const Configuration configuration = configurationFromEnvironment();
-    auto channels = std::make_shared<const Channels>(configuration);
-    reportProblem(*channels, configuration.problem);
+    const LogSettings settings = settingsFromEnvironment();
+    auto channels = std::make_shared<const Channels>(settings);
+    reportProblem(*channels, settings.problem);
     install(std::move(channels));
 }
 
@@ -114,7 +114,7 @@ std::string Channel::problem() const
     return problem_;
 }
 
-// Said once: a sink that now takes a line and now does not would fill the system's log.
+// Reports to syslog once: a sink that fails now and then would fill the system's log.
 void Channel::setProblem(std::string problem) const
 {
     const std::lock_guard lock(guard_);
@@ -124,8 +124,8 @@ void Channel::setProblem(std::string problem) const
     ::syslog(LOG_DAEMON | LOG_WARNING, "%s; its lines are lost", problem_.c_str());
 }
 
-Channels::Channels(const Configuration& configuration)
-    : level(configuration.level), log("log", configuration.log), trace("trace", configuration.trace)
+Channels::Channels(const LogSettings& settings)
+    : level(settings.level), log("log", settings.log), trace("trace", settings.trace)
 {
 }
 
@@ -148,10 +148,10 @@ try {
     return false;
 }
 
-void configure(const Configuration& configuration)
+void configure(const LogSettings& settings)
 {
-    auto channels = std::make_shared<const Channels>(configuration);
-    reportProblem(*channels, configuration.problem);
+    auto channels = std::make_shared<const Channels>(settings);
+    reportProblem(*channels, settings.problem);
     const std::lock_guard lock(guard);
     if (!unloading)
         install(std::move(channels));

@@ -1,11 +1,11 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The two channels as they are configured at a moment.
+// The log channel and the trace channel with the settings in effect.
 
 #pragma once
 
-#include "platform/logging/Configuration.h"
 #include "platform/logging/LineFormat.h"
+#include "platform/logging/LogSettings.h"
 
 #include <memory>
 #include <mutex>
@@ -18,7 +18,7 @@ class logger;
 
 namespace RynLog {
 
-// A named way to a sink. Thread-safe.
+// Writes lines under its name to a sink. Thread-safe.
 class Channel {
 public:
     // Throws std::invalid_argument when the setting makes no sense.
@@ -32,32 +32,33 @@ public:
     void write(
         int level, const Origin& origin, std::string_view component, std::string_view text) const;
 
-    // Why the sink could not be opened, or did not take the last line; empty when all is well.
+    // Returns why the sink could not be opened or the last line not be written; empty without an
+    // error.
     std::string problem() const;
 
 private:
     void setProblem(std::string problem) const;
 
     std::string name_;
-    std::unique_ptr<spdlog::logger> logger_; // null when lines lead nowhere
+    std::unique_ptr<spdlog::logger> logger_; // null when the channel is off
     mutable std::mutex guard_;               // of what follows
     mutable std::string problem_;
     mutable bool isReported_ = false;
 };
 
 struct Channels {
-    explicit Channels(const Configuration& configuration);
+    explicit Channels(const LogSettings& settings);
 
     int level;
     Channel log;
     Channel trace;
 };
 
-// The channels in effect, configured from the environment at the first call. Null once the
+// Returns the channels in effect, set up from the environment at the first call; null once the
 // library is being unloaded. The caller's share keeps them open while it writes.
 std::shared_ptr<const Channels> activeChannels();
 
-// Whether a line of the level has somewhere to go.
+// Returns whether any open channel writes lines of the level.
 bool anyChannelWants(int level) noexcept;
 
 } // namespace RynLog

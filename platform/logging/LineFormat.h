@@ -1,7 +1,5 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The text of one line, without its time.
-
 #pragma once
 
 #include <string>

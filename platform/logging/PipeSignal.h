@@ -1,7 +1,5 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Writing to a pipe whose reader may be gone.
-
 #pragma once
 
 #include <csignal>
@@ -9,8 +7,8 @@
 
 namespace RynLog {
 
-// While it lives, a write of this thread to a broken pipe fails with EPIPE instead of ending
-// the process. The process's signal handling stays as it is.
+// Blocks SIGPIPE on this thread while it lives, so that a write to a broken pipe fails with EPIPE
+// instead of ending the process. The process's signal handlers are not changed.
 class PipeSignalBlocked {
 public:
     PipeSignalBlocked() noexcept;
@@ -18,17 +16,17 @@ public:
     PipeSignalBlocked(const PipeSignalBlocked&) = delete;
     PipeSignalBlocked& operator=(const PipeSignalBlocked&) = delete;
 
-    // Takes back the signal of a write that failed with EPIPE.
+    // Discards the pending signal of a write that failed with EPIPE.
     void discard() const noexcept;
 
 private:
     sigset_t pipeSignal_{};
     sigset_t before_{};
-    bool wasPending_ = false; // a signal that is somebody else's business
+    bool wasPending_ = false; // a signal that was pending before stays pending
 };
 
-// Writes the bytes, as many as can be written, whoever reads them or has gone. Returns what
-// kept the rest from being written, an errno, or 0.
+// Writes as many of the bytes as can be written. Returns 0, or the errno for which the rest was not
+// written.
 int writeWhole(int descriptor, std::string_view bytes) noexcept;
 
 // One write to the process's standard error, so that lines of several threads stay whole.

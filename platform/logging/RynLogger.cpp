@@ -17,7 +17,7 @@ try {
     if (channels && level >= channels->level && ((*channels).*channel).isOpen())
         ((*channels).*channel).write(level, origin, component, text);
 } catch (...) {
-    // The line is lost: a caller is never disturbed by its own diagnostics.
+    // The line is lost: diagnostics never make their caller fail.
 }
 
 } // namespace

@@ -20,7 +20,7 @@ namespace RynLog {
 // to syslog is left as the process set it.
 //
 // Every function may be called from any thread and never throws: a line that cannot be
-// written is lost, the caller is not disturbed. A null text is written as (null).
+// written is lost. A null text is written as (null).
 class RynLogger {
 public:
     // Writes one line to the log channel. `function`, `file` and `line` say where it comes
@@ -38,8 +38,8 @@ public:
     // load, so that a caller need not compose a line that nobody wants.
     static bool isWanted(int level) noexcept;
 
-    // What hinders the lines of the log channel, in words: why its file could not be opened, or
-    // why the last line could not be written. Empty when nothing does.
+    // Returns why the log channel's file could not be opened or its last line not be written; empty
+    // without an error.
     static std::string logProblem() noexcept;
 };
 

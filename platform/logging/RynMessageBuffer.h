@@ -17,8 +17,8 @@ namespace RynLog {
 
 // Prints as a std::ostream of the classic locale prints, whatever the process's locale is:
 // pointers as addresses (0x... or 0), booleans as 0 or 1. A null text is printed as (null).
-// The usual values take a short way that needs no stream, since parameter lists are composed
-// for every object of an enumeration. Not for use by several threads at once.
+// The usual values are printed without a stream, since parameter lists are composed for every
+// object of an enumeration. Not thread-safe.
 class RynMessageBuffer {
 public:
     template <typename Value>
@@ -35,7 +35,7 @@ public:
         return *this;
     }
 
-    // The text streamed since the previous call.
+    // Returns the text streamed since the previous call.
     std::string str();
 
 private:

@@ -1,7 +1,5 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// What the value of a sink setting means.
-
 #pragma once
 
 #include <optional>
@@ -9,14 +7,15 @@
 
 namespace RynLog {
 
+// The parsed value of RYNLOG_LOG or RYNLOG_TRACE.
 struct SinkSetting {
     enum class Kind { off, syslog, standardError, file };
 
     Kind kind = Kind::off;
-    std::string path{}; // of a file, never empty then
+    std::string path{}; // of a file; never empty for one
 };
 
-// Understands syslog, stderr, file:PATH and off; nothing for anything else.
+// Parses syslog, stderr, file:PATH and off; returns nothing for any other text.
 std::optional<SinkSetting> parseSinkSetting(const std::string& text);
 
 } // namespace RynLog

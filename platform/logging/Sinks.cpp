@@ -61,7 +61,7 @@ private:
 
 class FileSink : public DescriptorSink {
 public:
-    // Takes over the descriptor.
+    // Owns the descriptor.
     FileSink(int descriptor, std::string name)
         : DescriptorSink(descriptor, std::move(name)), owned_(descriptor)
     {

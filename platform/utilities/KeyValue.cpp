@@ -37,7 +37,7 @@ std::string_view charactersOf(const char* characters)
     return characters != nullptr ? std::string_view(characters) : std::string_view();
 }
 
-// The form that the standard gives a point in time or an interval.
+// Returns the datetime format of DSP0004, section 5.2.4.
 std::string_view standardForm(CMPIDateTime* dateTime)
 {
     if (dateTime == nullptr || dateTime->hdl == nullptr || dateTime->ft == nullptr)

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The value of an object path's key, free of the many ways in which a broker can hand it over.
+// The value of an object path's key, whatever CMPI type the broker represents it by.
 
 #pragma once
 
@@ -20,20 +20,22 @@ struct KeyInteger {
     bool operator==(const KeyInteger&) const = default;
 };
 
-// There is no value.
+// The key has no value.
 struct KeyAbsent {};
 
-// There is one, of a type that no key can have, or one the broker marked as bad.
+// The key has a value of a type that no key can have, or one that the broker marked as bad.
 struct KeyUnusable {};
 
-// Texts and paths belong to the broker and live as long as the value they were taken from.
+// Texts and paths belong to the broker and live as long as the CMPIData they were read from.
 using KeyValue = std::variant<KeyAbsent, KeyUnusable, bool, char16_t, KeyInteger, double,
     std::string_view, const CMPIObjectPath*>;
 
-// Follows no pointer that the value's type and state do not vouch for.
+// Converts a key's value. Dereferences a pointer only where the type and the state of the value say
+// that there is one.
 KeyValue keyValue(const CMPIData& data);
 
-// The characters of a broker's string; an empty view with a null pointer when there are none.
+// Returns the characters of a broker's string; an empty view with a null pointer when there are
+// none.
 std::string_view textOf(CMPIString* string);
 
 } // namespace Vorn

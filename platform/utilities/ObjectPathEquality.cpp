@@ -48,7 +48,7 @@ bool sameNamespace(const CMPIObjectPath* a, const CMPIObjectPath* b)
     return namespaceA.empty() || namespaceB.empty() || isSameName(namespaceA, namespaceB);
 }
 
-// The keys that count; nothing when the broker fails to list them.
+// Returns the keys to compare; nothing when the broker fails to list them.
 std::optional<std::vector<Key>> keysOf(const CMPIObjectPath* path, bool comparesReferences)
 {
     CMPIStatus status{};

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Small services every provider needs. All may be called from any thread.
+// Functions that several providers need. Thread-safe.
 
 #pragma once
 
@@ -11,22 +11,22 @@
 
 namespace Vorn {
 
-// The kernel's host name; no look-up in the network. Empty only when the kernel refuses.
+// Returns the kernel's host name, without a look-up in the network; empty only when uname() fails.
 std::string getSystemName();
 
-// Without leading and trailing blanks, which are spaces and tabs.
+// Returns the text without spaces and tabs at either end.
 std::string stripSpaces(const std::string& text);
 
-// UTF-8 from wide characters and back. Each wide character that is no code point and each byte
-// that belongs to no character becomes U+FFFD. Throws only for lack of memory.
+// Convert wide characters to UTF-8 and back. Each wide character that is no code point and each
+// byte that belongs to no character becomes U+FFFD. Throws only for lack of memory.
 std::string make_string(const std::wstring& text);
 std::wstring make_wstring(const std::string& text);
 
-// Whether two CIM names (of a class, a property, a namespace) are the same: without regard to
-// ASCII case, whatever the process's locale.
+// Returns whether two CIM names (of a class, a property, a namespace) are the same. Names are
+// case-insensitive (DSP0004); the comparison is that of ASCII, whatever the process's locale.
 bool isSameName(std::string_view a, std::string_view b);
 
-// Whether two object paths name the same instance.
+// Returns whether two object paths name the same instance.
 //
 // Class names and key names are compared without regard to case; the number of keys is the same,
 // their order does not matter. Host names are ignored, namespaces (compared without regard to

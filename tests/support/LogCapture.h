@@ -4,7 +4,7 @@
 
 #pragma once
 
-#include "platform/logging/Configuration.h"
+#include "platform/logging/LogSettings.h"
 #include "tests/support/TemporaryFolder.h"
 
 #include <ostream>

@@ -67,7 +67,7 @@ void ChipList::renew()
         const std::string present = machineFingerprint();
         try {
             if (hasHwmon())
-                initialise(Configuration());
+                initialise(SensorsConfiguration());
             fingerprint_ = present;
             return;
         } catch (const std::runtime_error&) {
@@ -77,7 +77,7 @@ void ChipList::renew()
     }
 }
 
-void ChipList::initialise(const Configuration& configuration)
+void ChipList::initialise(const SensorsConfiguration& configuration)
 {
     std::string text = configuration.text();
     const std::unique_ptr<FILE, decltype(&fclose)> file(
@@ -93,8 +93,8 @@ void ChipList::initialise(const Configuration& configuration)
 }
 
 // Chips come and go while the configuration stays: what was wrong before is not said again.
-void ChipList::reportOnce(
-    const std::vector<LibsensorsHooks::ParseError>& errors, const Configuration& configuration)
+void ChipList::reportOnce(const std::vector<LibsensorsHooks::ParseError>& errors,
+    const SensorsConfiguration& configuration)
 {
     std::vector<std::string> texts;
     for (const LibsensorsHooks::ParseError& error : errors) {

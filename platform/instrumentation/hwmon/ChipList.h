@@ -4,8 +4,8 @@
 
 #pragma once
 
-#include "platform/instrumentation/hwmon/Configuration.h"
 #include "platform/instrumentation/hwmon/LibsensorsHooks.h"
+#include "platform/instrumentation/hwmon/SensorsConfiguration.h"
 
 #include <shared_mutex>
 #include <string>
@@ -13,9 +13,9 @@
 
 namespace Vorn::Hwmon {
 
-// libsensors keeps one list for the whole process. Any number of threads may read from it, but
-// making it anew needs it alone: whoever calls libsensors holds a lock from here meanwhile, and
-// not longer, so that a thread with two cursors cannot stand in its own way.
+// libsensors keeps one list for the whole process. Any number of threads may read it, but renewing
+// it excludes all others: a caller of libsensors holds a lock of this class for the duration of the
+// call, and no longer, so that a thread with two cursors cannot block itself.
 //
 // While libsensors reads its configuration it sets the process's locale to "C" and back, which
 // its interface gives no way to avoid. It happens at the first request and when the machine
@@ -25,13 +25,14 @@ class ChipList {
 public:
     using Lock = std::shared_lock<std::shared_mutex>;
 
-    // The list of this process. libsensors is released when the library is unloaded.
+    // Returns the list of this process. libsensors is released when the library is unloaded.
     static ChipList& instance();
 
-    // The chips that the machine has now. Throws std::runtime_error with libsensors' reason.
+    // Returns the chips that the machine has now. Throws std::runtime_error with libsensors'
+    // reason.
     Lock lockPresent();
 
-    // The chips as they were listed last.
+    // Returns the chips as they were last listed.
     Lock lockKnown();
 
     ~ChipList();
@@ -42,14 +43,14 @@ private:
     ChipList() = default;
 
     void renew();
-    void initialise(const Configuration& configuration);
-    void reportOnce(
-        const std::vector<LibsensorsHooks::ParseError>& errors, const Configuration& configuration);
+    void initialise(const SensorsConfiguration& configuration);
+    void reportOnce(const std::vector<LibsensorsHooks::ParseError>& errors,
+        const SensorsConfiguration& configuration);
 
     std::shared_mutex mutex_;
     LibsensorsHooks hooks_;
-    std::string fingerprint_;           // of the machine that is listed; empty when nothing is
-    std::vector<std::string> reported_; // what is wrong in the configuration
+    std::string fingerprint_;           // of the machine when it was listed; empty before
+    std::vector<std::string> reported_; // errors in the configuration
 };
 
 } // namespace Vorn::Hwmon

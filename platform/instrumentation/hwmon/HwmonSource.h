@@ -1,7 +1,5 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The fans, voltages and temperatures that the kernel's drivers measure.
-
 #pragma once
 
 #include "platform/instrumentation/Source.h"
@@ -17,9 +15,10 @@ namespace Hwmon {
 struct FeatureId;
 }
 
-// One node per feature, by way of libsensors, so that the `label`, `compute` and `ignore` lines
-// of the administrator's sensors configuration hold. A chip that came or went shows when nodes
-// are listed next; one that went after that reads as status 13 without any property.
+// Serves the fans, voltages and temperatures of the kernel's hwmon interface, a node for each
+// feature, through libsensors, so that the `label`, `compute` and `ignore` lines of the
+// administrator's configuration apply. Chips added or removed show when nodes are listed next; a
+// node whose chip was removed since reads as status 13 without properties.
 class HwmonSource final : public Source {
 public:
     HwmonSource();
@@ -34,7 +33,7 @@ public:
 private:
     std::vector<Node> nodesOf(const sensors_chip_name& chip, NodeLexicon::NodeType type);
 
-    std::vector<Hwmon::FeatureId> listed_; // a node's token is its place here
+    std::vector<Hwmon::FeatureId> listed_; // a node's token is its index here
 };
 
 } // namespace Vorn

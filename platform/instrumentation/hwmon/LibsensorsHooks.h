@@ -1,7 +1,5 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Keeps libsensors from printing and from ending the process.
-
 #pragma once
 
 #include <string>
@@ -9,14 +7,13 @@
 
 namespace Vorn::Hwmon {
 
-// libsensors reports through function pointers that whoever uses it shares; by default they
-// print to standard error, and the one for fatal errors calls exit(). While an object lives they
-// lead here; then those that were there before come back.
+// Keeps libsensors from printing and from ending the process. It reports through function pointers
+// that are global to the process; by default they print to standard error, and the one for fatal
+// errors calls exit(). An object replaces them while it lives and then restores them.
 //
 // The fatal error is a lack of memory. Its hook must not return, so it throws std::bad_alloc
 // through libsensors, which holds no locks and whose unwind tables let exceptions pass; what
-// the interrupted function had allocated is lost. Ending the process of whoever loaded this
-// library would be worse.
+// the interrupted function had allocated is lost.
 class LibsensorsHooks {
 public:
     LibsensorsHooks();
@@ -26,10 +23,10 @@ public:
 
     struct ParseError {
         std::string text;
-        int line; // 0 when it is about no line
+        int line; // 0 when the error has no line
     };
 
-    // Collects what is wrong in the configuration while it lives.
+    // Collects the errors in the configuration while it lives.
     // REQUIRES: one object at a time in the process.
     class ParseErrors {
     public:

@@ -3,7 +3,7 @@
 #include "platform/instrumentation/hwmon/Machine.h"
 
 #include "platform/instrumentation/FileStamp.h"
-#include "platform/instrumentation/hwmon/Configuration.h"
+#include "platform/instrumentation/hwmon/SensorsConfiguration.h"
 
 #include <algorithm>
 #include <filesystem>

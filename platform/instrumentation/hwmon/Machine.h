@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Whether chips came or went, or the administrator changed the sensors configuration.
+// Changes of the set of chips and of the sensors configuration.
 
 #pragma once
 
@@ -8,11 +8,11 @@
 
 namespace Vorn::Hwmon {
 
-// Whether the kernel has a hwmon class at all. Where it has none there are no sensors, and
-// libsensors would take the lack for an error of the kernel's interface.
+// Returns whether the kernel has a hwmon class. Where it has none there are no sensors, and
+// libsensors would report an error of the kernel's interface.
 bool hasHwmon();
 
-// A text that stays the same as long as the set of chips and the configuration do; never empty.
+// Returns a text that changes with the set of chips and with the configuration; never empty.
 // Costs a few system calls per chip.
 std::string machineFingerprint();
 

@@ -76,7 +76,7 @@ unsigned statusOf(const Channel& channel)
         return criticalLow;
     if (isRaised(alarms.max) || isAtOrAbove(reading, limits.max))
         return warningHigh;
-    // A fan with a plain alarm that is at or below its minimum is among these.
+    // This includes a fan with a plain alarm that is at or below its minimum.
     if (isRaised(alarms.min) || isAtOrBelow(reading, limits.min))
         return warningLow;
     return isRaised(alarms.plain) ? warning : normal;

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// From what a hwmon channel shows to the status of its node.
+// The node status of a hwmon channel.
 
 #pragma once
 
@@ -9,8 +9,8 @@
 
 namespace Vorn::Hwmon {
 
-// Limits in the unit of the reading; see Documentation/hwmon/sysfs-interface.rst of the kernel
-// for what each attribute means.
+// Limits in the unit of the reading. The kernel's Documentation/hwmon/sysfs-interface.rst defines
+// each attribute.
 struct Limits {
     std::optional<double> min = {};
     std::optional<double> max = {};
@@ -37,18 +37,19 @@ struct Channel {
     Alarms alarms = {};
 };
 
-// Chips and drivers show 0 for limits that nobody set. A pair of limits (min and max, lcrit and
-// crit) in which no end differs from 0 is therefore taken for absent, and so is an emergency
-// limit of 0; an end that the channel does not have counts as 0. Where one end is set, the other
-// one's 0 is meant: 0 V below a positive maximum. An end that is there but cannot be read, which
-// is NaN here and absent afterwards, may well be set: the other one's 0 stays.
+// Returns the limits without those that are unset. Drivers report 0 for an unset limit. A pair (min
+// and max, lcrit and crit) whose ends are both 0 or missing counts as unset, and so does an
+// emergency limit of 0. Where one end is set, a 0 of the other is a limit: 0 V below a positive
+// maximum. An end that cannot be read, NaN here and absent in the result, may be set: a 0 of the
+// other stays.
 Limits withoutUnset(const Limits& limits);
 
-// The status code of the node. REQUIRES: the limits are withoutUnset().
+// Returns the status code of the node. REQUIRES: the limits are withoutUnset().
 unsigned statusOf(const Channel& channel);
 
-// The codes that statusOf() can give for a channel with these limits and alarms, ascending. A
-// lost channel (13) is left out: it says nothing about the sensor. REQUIRES: as above.
+// Returns the codes that statusOf() can return for a channel with these limits and alarms,
+// ascending, without that of lost communication (13), which is no state of the sensor. REQUIRES:
+// the limits are withoutUnset().
 std::vector<unsigned> possibleStatesOf(const Channel& channel);
 
 } // namespace Vorn::Hwmon

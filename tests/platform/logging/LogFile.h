@@ -4,7 +4,7 @@
 
 #pragma once
 
-#include "platform/logging/Configuration.h"
+#include "platform/logging/LogSettings.h"
 #include "platform/logging/RynLogger.h"
 #include "tests/support/TemporaryFolder.h"
 
@@ -35,7 +35,7 @@ private:
 // Closes both channels again, so that no test sees the lines of another.
 class ScopedConfiguration {
 public:
-    explicit ScopedConfiguration(const RynLog::Configuration& configuration)
+    explicit ScopedConfiguration(const RynLog::LogSettings& configuration)
     {
         RynLog::configure(configuration);
     }

@@ -2,7 +2,7 @@
 
 // What a provider library looks like to the process that loads it: it logs, and goes.
 
-#include "platform/logging/Configuration.h"
+#include "platform/logging/LogSettings.h"
 #include "platform/logging/RynLogger.h"
 
 extern "C" __attribute__((visibility("default"))) void logOneLine(const char* path)

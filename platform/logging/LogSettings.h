@@ -8,23 +8,23 @@
 
 namespace RynLog {
 
-struct Configuration {
+struct LogSettings {
     int level = 6000;           // RYNLOG_LEVEL: lowest level written
     std::string log = "syslog"; // RYNLOG_LOG: syslog, stderr, file:PATH or off
     std::string trace = "off";  // RYNLOG_TRACE: the same values
-    std::string problem{};      // what was wrong with the settings, in words; empty when nothing
+    std::string problem{};      // which settings make no sense; empty when all do
 };
 
-// What the environment says, read with secure_getenv; an empty variable counts as not set.
-// A value that makes no sense is named in `problem` and its default is taken.
-Configuration configurationFromEnvironment();
+// Reads the environment with secure_getenv; an empty variable counts as not set. A value that makes
+// no sense is named in `problem`, and its default is used.
+LogSettings settingsFromEnvironment();
 
-// Replaces the configuration that took effect at first use, which is the environment's. Lines
-// under way on other threads are finished with the one they began with. A `problem` becomes the
+// Replaces the settings in effect, which are at first those of the environment. Lines that other
+// threads are writing are finished with the settings they began with. A `problem` becomes the
 // first line of the log channel. A file is created when missing and always appended to; it stays
-// open until the next configuration or until the library is unloaded. One that cannot be opened
+// open until the next call or until the library is unloaded. One that cannot be opened
 // or written is reported to syslog, once, and the lines of its channel are lost.
 // Throws std::invalid_argument naming a sink that makes no sense; nothing is replaced then.
-void configure(const Configuration& configuration);
+void configure(const LogSettings& settings);
 
 } // namespace RynLog

@@ -1,7 +1,5 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The administrator's sensors configuration, see sensors.conf(5).
-
 #pragma once
 
 #include <filesystem>
@@ -10,21 +8,22 @@
 
 namespace Vorn::Hwmon {
 
-// The files that libsensors reads when it is not told which, in its order.
+// Returns the files that libsensors reads by default, in its order; see sensors.conf(5).
 std::vector<std::filesystem::path> configurationFiles();
 
-// All of them as one text. Left to itself, the parser of libsensors 3.6.0 keeps a pointer to the
-// last `chip` statement through sensors_cleanup(); a statement that comes before the first valid
-// `chip` statement is then written to freed memory. The text begins with one of its own, which
-// names no chip there is, so that this cannot happen.
-class Configuration {
+// The text of all of these files. Left to itself, the parser of libsensors 3.6.0 keeps a pointer to
+// the last `chip` statement through sensors_cleanup(); a statement that comes before the first
+// valid `chip` statement is then written to freed memory. The text begins with one of its own,
+// which names no chip there is, so that this cannot happen.
+class SensorsConfiguration {
 public:
     // Throws std::runtime_error naming the file that cannot be read.
-    Configuration();
+    SensorsConfiguration();
 
     const std::string& text() const { return text_; }
 
-    // Where a line of the text, counted from 1, comes from, such as "/etc/sensors3.conf:12".
+    // Returns the place that a line of the text, counted from 1, comes from, such as
+    // "/etc/sensors3.conf:12".
     std::string place(int line) const;
 
 private:

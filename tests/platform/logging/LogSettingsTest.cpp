@@ -1,31 +1,31 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-#include "platform/logging/Configuration.h"
+#include "platform/logging/LogSettings.h"
 #include "tests/platform/logging/LogFile.h"
 #include "tests/support/Environment.h"
 
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
-namespace ConfigurationTests {
+namespace LogSettingsTests {
 
-using RynLog::configurationFromEnvironment;
+using RynLog::settingsFromEnvironment;
 using testing::AllOf;
 using Testing::EnvironmentVariable;
 using testing::HasSubstr;
 using testing::SizeIs;
 
 // What the three variables lead to, given in the order level, log, trace.
-RynLog::Configuration configured(
+RynLog::LogSettings configured(
     const std::string& level, const std::string& log, const std::string& trace)
 {
     const EnvironmentVariable levelVariable("RYNLOG_LEVEL", level);
     const EnvironmentVariable logVariable("RYNLOG_LOG", log);
     const EnvironmentVariable traceVariable("RYNLOG_TRACE", trace);
-    return configurationFromEnvironment();
+    return settingsFromEnvironment();
 }
 
-TEST(Configuration, TakesTheDefaultsWhenNothingIsSet)
+TEST(LogSettingsTest, TakesTheDefaultsWhenNothingIsSet)
 {
     const auto configuration = configured("", "", "");
     EXPECT_EQ(configuration.level, 6000);
@@ -34,7 +34,7 @@ TEST(Configuration, TakesTheDefaultsWhenNothingIsSet)
     EXPECT_EQ(configuration.problem, "");
 }
 
-TEST(Configuration, TakesTheValuesOfTheEnvironment)
+TEST(LogSettingsTest, TakesTheValuesOfTheEnvironment)
 {
     const auto configuration = configured("3000", "stderr", "file:/some/where");
     EXPECT_EQ(configuration.level, 3000);
@@ -43,13 +43,13 @@ TEST(Configuration, TakesTheValuesOfTheEnvironment)
     EXPECT_EQ(configuration.problem, "");
 }
 
-TEST(Configuration, AcceptsEverySink)
+TEST(LogSettingsTest, AcceptsEverySink)
 {
     for (const std::string sink : {"syslog", "stderr", "off", "file:x"})
         EXPECT_EQ(configured("", sink, sink).problem, "") << sink;
 }
 
-TEST(Configuration, ABadLevelIsNamedAndTheDefaultTaken)
+TEST(LogSettingsTest, ABadLevelIsNamedAndTheDefaultTaken)
 {
     for (const std::string level :
         {"high", "60OO", " 6000", "6000 ", "0x10", "1e3", "99999999999999999999", "-", "3000\n"}) {
@@ -60,7 +60,7 @@ TEST(Configuration, ABadLevelIsNamedAndTheDefaultTaken)
     }
 }
 
-TEST(Configuration, ABadSinkIsNamedAndItsDefaultTaken)
+TEST(LogSettingsTest, ABadSinkIsNamedAndItsDefaultTaken)
 {
     for (const std::string sink : {"file:", "file", "Syslog", "stdout", " off", "/tmp/x"}) {
         const auto configuration = configured("", sink, sink);
@@ -71,7 +71,7 @@ TEST(Configuration, ABadSinkIsNamedAndItsDefaultTaken)
     }
 }
 
-TEST(Configuration, AProblemIsTheFirstLineOfTheLogChannel)
+TEST(LogSettingsTest, AProblemIsTheFirstLineOfTheLogChannel)
 {
     const Testing::LogFile file;
     const Testing::ScopedConfiguration configuration(
@@ -83,7 +83,7 @@ TEST(Configuration, AProblemIsTheFirstLineOfTheLogChannel)
     EXPECT_THAT(file.lines()[1], HasSubstr("second"));
 }
 
-TEST(Configuration, ASinkThatMakesNoSenseChangesNothing)
+TEST(LogSettingsTest, ASinkThatMakesNoSenseChangesNothing)
 {
     const Testing::LogFile file;
     const Testing::ScopedConfiguration configuration({6000, file.sink(), "off"});
@@ -93,4 +93,4 @@ TEST(Configuration, ASinkThatMakesNoSenseChangesNothing)
     EXPECT_THAT(file.lines(), SizeIs(1));
 }
 
-} // namespace ConfigurationTests
+} // namespace LogSettingsTests

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-#include "platform/instrumentation/hwmon/Configuration.h"
+#include "platform/instrumentation/hwmon/SensorsConfiguration.h"
 
 #include "platform/instrumentation/RegularFile.h"
 
@@ -58,13 +58,13 @@ std::vector<fs::path> configurationFiles()
     return files;
 }
 
-Configuration::Configuration() : text_(safeStart)
+SensorsConfiguration::SensorsConfiguration() : text_(safeStart)
 {
     for (const fs::path& file : configurationFiles())
         append(file);
 }
 
-void Configuration::append(const fs::path& file)
+void SensorsConfiguration::append(const fs::path& file)
 {
     parts_.push_back({file.string(), lineCount(text_) + 1});
     try {
@@ -76,7 +76,7 @@ void Configuration::append(const fs::path& file)
     text_ += "\n\n";
 }
 
-std::string Configuration::place(int line) const
+std::string SensorsConfiguration::place(int line) const
 {
     const auto after = std::find_if(parts_.begin(), parts_.end(),
         [line](const Part& candidate) { return candidate.firstLine > line; });

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-#include "platform/logging/Configuration.h"
+#include "platform/logging/LogSettings.h"
 
 #include "platform/logging/SinkSetting.h"
 
@@ -38,15 +38,15 @@ void complain(
     problem.append(" makes no sense, ").append(taken).append(" is used instead");
 }
 
-void readLevel(const char* variable, Configuration& configuration)
+void readLevel(const char* variable, LogSettings& settings)
 {
     const std::string value = environmentText(variable);
     if (value.empty())
         return;
     if (const auto level = parseLevel(value))
-        configuration.level = *level;
+        settings.level = *level;
     else
-        complain(configuration.problem, variable, value, std::to_string(configuration.level));
+        complain(settings.problem, variable, value, std::to_string(settings.level));
 }
 
 void readSink(const char* variable, std::string& sink, std::string& problem)
@@ -62,13 +62,13 @@ void readSink(const char* variable, std::string& sink, std::string& problem)
 
 } // namespace
 
-Configuration configurationFromEnvironment()
+LogSettings settingsFromEnvironment()
 {
-    Configuration configuration;
-    readLevel("RYNLOG_LEVEL", configuration);
-    readSink("RYNLOG_LOG", configuration.log, configuration.problem);
-    readSink("RYNLOG_TRACE", configuration.trace, configuration.problem);
-    return configuration;
+    LogSettings settings;
+    readLevel("RYNLOG_LEVEL", settings);
+    readSink("RYNLOG_LOG", settings.log, settings.problem);
+    readSink("RYNLOG_TRACE", settings.trace, settings.problem);
+    return settings;
 }
 
 } // namespace RynLog
