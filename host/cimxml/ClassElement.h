@@ -1,7 +1,5 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Classes as elements.
-
 #pragma once
 
 #include "host/cimxml/ObjectSelection.h"

@@ -8,7 +8,7 @@
 
 namespace Host::CimXml {
 
-// What a call's parameter says cannot be: the operation is answered with an error.
+// Throws Refusal (CMPI_RC_ERR_INVALID_PARAMETER).
 [[noreturn]] inline void refuse(const std::string& reason)
 {
     throw Refusal(CMPI_RC_ERR_INVALID_PARAMETER, reason);

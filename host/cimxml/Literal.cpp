@@ -115,7 +115,8 @@ void appendNumber(std::string& out, Number number)
     out.append(buffer.data(), std::to_chars(buffer.begin(), buffer.end(), number).ptr);
 }
 
-// The shortest text that reads back as the same number, with the point the protocol wants.
+// Appends the shortest text that reads back as the same number, with the decimal point that
+// DSP0004 wants.
 template <typename Number>
 void appendReal(std::string& out, Number number)
 {

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Values as the protocol spells them.
+// Values as DSP0201 spells them.
 
 #pragma once
 
@@ -16,22 +16,24 @@ class Arena;
 
 namespace Host::CimXml {
 
-// The type that an attribute TYPE or PARAMTYPE names, without regard to letter case; nothing for
-// a word that is none.
+// Returns the type that an attribute TYPE names, in any letter case; nothing for another word.
 std::optional<CMPIType> typeNamed(std::string_view word);
 
-// The word for a type or its elements. An embedded instance is a string.
+// Returns the name of a type, or of the elements of an array type. An embedded instance is a
+// string.
 std::string nameOf(CMPIType type);
 
-// White space around a value that is no text counts for nothing. Nothing when the text is no
-// value of the type. REQUIRES: the type is simple, and neither reference nor instance.
+// Reads a value of the type, without white space around it unless it is a text. Returns nothing
+// when the text is no value of the type. REQUIRES: the type is simple, and neither reference nor
+// instance.
 std::optional<Value> readLiteral(Arena& arena, CMPIType type, std::string_view text);
 
-// The least wide type that says what a number without declared type says: uint64, sint64 where
-// it is negative, real64 where it is no integer. Nothing when it is no number.
+// Reads a number without declared type as uint64, as sint64 where it is negative, as real64 where
+// it is no integer. Returns nothing when it is no number.
 std::optional<Value> readNumber(Arena& arena, std::string_view text);
 
-// As the content of VALUE or KEYVALUE. Nothing for a null, an array, a reference or an instance.
+// Appends the content of VALUE or KEYVALUE; nothing for a null, an array, a reference or an
+// instance.
 void appendLiteral(std::string& out, const Value& value);
 
 } // namespace Host::CimXml

@@ -1,6 +1,7 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// What of an object a client wants to see.
+// The parts of an object that a response holds: PropertyList, LocalOnly, IncludeQualifiers and
+// IncludeClassOrigin of DSP0200.
 
 #pragma once
 
@@ -18,22 +19,23 @@ struct Qualifier;
 namespace Host::CimXml {
 
 struct ObjectSelection {
-    std::optional<std::vector<std::string>> properties; // all, unless there is a list
+    std::optional<std::vector<std::string>> properties; // all of them without a list
     bool localOnly = false;
     bool includeQualifiers = false;
     bool includeClassOrigin = false;
 };
 
-// Whether the list, if there is one, has the name, in any letter case.
+// Returns whether the property list, if there is one, has the name, in any letter case.
 bool isListed(const ObjectSelection& selection, std::string_view propertyName);
 
-// Whether a property of the class, or of an instance of it, is to be shown. Local are properties
-// that the class itself declares, anew or for the first time. A property that the class does not
-// have is local. The class is null where it is not known; all properties are local then.
+// Returns whether a property of the class, or of an instance of it, is selected. A property is
+// local when the class itself declares or overrides it, or does not have it. The class is null
+// where it is not known; all properties are local then.
 bool isSelected(const ObjectSelection& selection, const ClassDeclaration* declared,
     std::string_view propertyName);
 
-// Of a class or a property. Local are those that it carries itself.
+// Returns whether a qualifier of a class or a property is selected. It is local when it is not
+// propagated.
 bool isSelected(const ObjectSelection& selection, const Qualifier& qualifier);
 
 } // namespace Host::CimXml

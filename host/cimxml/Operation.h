@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// An operation with its parameters, as a dispatcher needs it.
+// An intrinsic operation (DSP0200) with its parameters.
 
 #pragma once
 
@@ -46,9 +46,9 @@ enum class OperationKind {
     closeEnumeration,
 };
 
-// What an operation does not take, and what the client did not give, is as here; flags have the
-// defaults of their operation. Namespaces and classes are spelled as they are declared, or as the
-// client spells them where they are not.
+// Parameters that the operation does not have or the client did not give keep the values below;
+// flags have the defaults of their operation. Namespaces and classes are spelled as they are
+// declared, or as the client spells them where they are not.
 struct Operation {
     OperationKind kind = OperationKind::getInstance;
     std::string nameSpace;
@@ -57,9 +57,9 @@ struct Operation {
     const ObjectPath* path = nullptr; // of the instance, or of an association's source
 
     bool deepInheritance = false;
-    ObjectSelection selection; // with LocalOnly and the like, and the property list
+    ObjectSelection selection;
 
-    // References have their association class in resultClass.
+    // Operations on references have their association class in resultClass.
     std::string associationClass;
     std::string resultClass;
     std::string role;

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Where a transport takes the messages it has received.
+// The interface between a transport and what carries operations out.
 
 #pragma once
 
@@ -12,36 +12,35 @@ namespace Host::CimXml {
 
 class Message;
 
-// Who asks, as the transport knows it.
+// The client that sent a message, as the transport knows it.
 struct Caller {
-    std::string principal; // the name signed in with; empty where nobody signs in
+    std::string principal; // the authenticated user; empty without authentication
     std::string address;   // for the log
     std::string acceptLanguage;
 };
 
-// The answer to one message, told in pieces. Used by one thread at a time, not always the one it
-// was made on.
+// The response to one message. Used by one thread at a time, which need not be the one that made
+// it.
 class Response {
 public:
     virtual ~Response() = default;
 
-    // Appends what comes next, some kilobytes at most for an answer of many objects; false when
-    // the answer has ended and nothing was appended.
+    // Appends the next piece, a few kilobytes of a response with many objects, and returns true;
+    // returns false at the end of the response.
     virtual bool append(std::string& out) = 0;
 
-    // How many objects are in memory for as long as the answer is not dropped.
+    // Returns the number of objects that stay in memory as long as the response does.
     virtual std::size_t heldObjects() const noexcept = 0;
 };
 
-// Asked from any thread, by many at a time.
+// Thread-safe.
 class OperationHandler {
 public:
     virtual ~OperationHandler() = default;
 
-    // Carries the operation out before it returns: whether it failed is settled by then, and a
-    // failure is an answer too. What the answer holds, it holds once, as objects, and writes
-    // them when its pieces are asked for. Throws RequestError for a message in which an element
-    // lacks something, and std::bad_alloc.
+    // Carries the operation out, so that an operation that fails returns an error response. The
+    // response holds the objects once and writes their XML when its pieces are asked for. Throws
+    // RequestError for a message that is not loosely valid, and std::bad_alloc.
     virtual std::unique_ptr<Response> answer(const Message& message, const Caller& caller) = 0;
 };
 

@@ -24,7 +24,7 @@ std::string described(Parameter parameter)
     return "parameter " + std::string(nameOf(parameter));
 }
 
-// The parameters of one call, found by name.
+// The IPARAMVALUEs of one call by their names.
 class Parameters {
 public:
     Parameters(const OperationForm& form, const Element& call) : form_(form)
@@ -37,13 +37,13 @@ public:
                 refuse(std::string(form.name) + " needs " + described(static_cast<P>(at)));
     }
 
-    // Null when it was not given, or without a value.
+    // Returns null when the parameter was not given, or without a value.
     const Element* operator[](P parameter) const
     {
         return values_[static_cast<std::size_t>(parameter)];
     }
 
-    // The same; throws when it is of another kind.
+    // Returns the same; throws when the element is of another kind.
     const Element* get(P parameter, std::string_view kind) const
     {
         const Element* const value = (*this)[parameter];
@@ -72,7 +72,7 @@ public:
                      : std::nullopt;
     }
 
-    // An empty list is one, and other than none.
+    // Returns nothing when there is no list, which differs from an empty one.
     std::optional<std::vector<std::string>> texts(P parameter) const
     {
         const Element* const value = get(parameter, "VALUE.ARRAY");

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The operations of the protocol and the parameters they take.
+// The intrinsic operations that are offered, with their parameters (DSP0200).
 
 #pragma once
 
@@ -67,10 +67,10 @@ struct OperationForm {
     ParameterSet trueByDefault;
 };
 
-// Without regard to letter case; null for an operation that is not offered.
+// Finds an operation by its name, in any letter case. Returns null for one that is not offered.
 const OperationForm* findOperation(std::string_view name);
 
-// As the protocol spells it.
+// Returns the parameter's name as DSP0200 spells it.
 std::string_view nameOf(Parameter parameter);
 
 } // namespace Host::CimXml

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Object paths as elements.
+// Object paths as elements (DSP0201).
 
 #pragma once
 
@@ -11,21 +11,22 @@
 
 namespace Host::CimXml {
 
-// What stands for a path's host or namespace where it has none of its own.
+// The host and namespace of a path that has none of its own.
 struct Location {
     std::string host;
     std::string nameSpace;
 };
 
-// INSTANCENAME. Texts and date-times are strings, numbers numeric; a null key is left out.
+// Appends INSTANCENAME. VALUETYPE is `string` for texts and date-times; a null key is left out.
 void writeInstanceName(std::string& out, const ObjectPath& path);
-// INSTANCEPATH
+// Appends INSTANCEPATH.
 void writeInstancePath(std::string& out, const ObjectPath& path, const Location& location);
-// OBJECTPATH around an INSTANCEPATH.
+// Appends OBJECTPATH around an INSTANCEPATH.
 void writeObjectPath(std::string& out, const ObjectPath& path, const Location& location);
-// CLASSPATH
+// Appends CLASSPATH.
 void writeClassPath(std::string& out, std::string_view className, const Location& location);
-// VALUE.REFERENCE, around an element that says no more than the path knows.
+// Appends VALUE.REFERENCE around INSTANCENAME, LOCALINSTANCEPATH or INSTANCEPATH, as the path has
+// a namespace and a host.
 void writeReference(std::string& out, const ObjectPath& path);
 
 } // namespace Host::CimXml

@@ -16,11 +16,11 @@ namespace Host::CimXml {
 
 namespace {
 
-// Keys of an object whose class is not known. Those of others are bounded by what the class has;
-// each is held against all before it.
+// Keys of a path whose class is not known; those of other classes are bounded by the class. Each is
+// compared with all before it.
 constexpr std::size_t maximumUndeclared = 1000;
 
-// The type a KEYVALUE itself names; CMPI_null for a number of any type.
+// Returns the type that a KEYVALUE itself names; CMPI_null for a number of any type.
 CMPIType namedType(const Element& element, const std::string& what)
 {
     if (const auto word = element.findAttribute("TYPE")) {
@@ -39,7 +39,7 @@ CMPIType namedType(const Element& element, const std::string& what)
     return CMPI_null;
 }
 
-// The one key of a class, for a client that leaves its name out.
+// Returns the only key of a class, for a KEYVALUE without KEYBINDING.
 const std::string& onlyKeyOf(const ClassDeclaration* declared, const ObjectPath& path)
 {
     if (declared == nullptr)
@@ -57,7 +57,7 @@ std::string nameSpaceOf(const Element& localNameSpacePath)
 {
     std::string all;
     for (const Element& part : localNameSpacePath.children({"NAMESPACE"})) {
-        // Some clients write a path of several names into one.
+        // Some clients write a namespace of several components into one NAMESPACE.
         std::string_view rest = part.attribute("NAME");
         while (!rest.empty()) {
             const std::string_view name = rest.substr(0, rest.find('/'));

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Object paths in a request.
+// Reading of object paths (DSP0201).
 
 #pragma once
 
@@ -18,9 +18,9 @@ namespace Host::CimXml {
 // there are none.
 std::string nameSpaceOf(const Element& localNameSpacePath);
 
-// Names of namespaces, classes and keys come out as they are declared, and keys are of the types
-// the class declares. Where the class is not known the client's spelling stays, and VALUETYPE or
-// TYPE say what a key is; without either it is a string.
+// Reads paths with the names of namespaces, classes and keys spelled as they are declared, and with
+// keys of the declared types. Where the class is not known the client's spelling stays, and
+// VALUETYPE or TYPE tell the type of a key; without either it is a string.
 //
 // Paths live in the arena of this thread's request. All functions throw RequestError for
 // elements that lack something, and Refusal: CMPI_RC_ERR_INVALID_PARAMETER with the key's name
@@ -30,9 +30,9 @@ class PathReader {
 public:
     explicit PathReader(const Repository& classes) : classes_(classes) {}
 
-    // An INSTANCENAME of the namespace.
+    // Reads an INSTANCENAME in the namespace.
     const ObjectPath& instanceName(const Element& element, std::string_view nameSpace) const;
-    // The class that a CLASSNAME or an INSTANCENAME names, as it is declared.
+    // Returns the class that a CLASSNAME or an INSTANCENAME names, spelled as it is declared.
     std::string className(const Element& element, std::string_view nameSpace) const;
 
 private:

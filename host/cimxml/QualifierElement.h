@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Qualifiers and their declarations as elements, with what properties of classes and of
+// Qualifiers and their declarations as elements (DSP0201), and what properties of classes and of
 // instances have in common.
 
 #pragma once
@@ -14,20 +14,20 @@
 
 namespace Host::CimXml {
 
-// PROPERTY, PROPERTY.ARRAY or PROPERTY.REFERENCE
+// Returns PROPERTY, PROPERTY.ARRAY or PROPERTY.REFERENCE.
 std::string_view elementNameFor(CMPIType propertyType);
 
-// The attribute EmbeddedObject, where the qualifiers say that a string holds an object.
+// Appends the attribute EmbeddedObject where the qualifiers say that a string holds an object.
 void writeEmbeddedObject(Markup& element, const QualifierList& qualifiers);
 
-// VALUE or VALUE.ARRAY; nothing for a null. Nulls in a list are left out.
+// Appends VALUE or VALUE.ARRAY; nothing for a null. Nulls in an array are left out.
 void writeConstant(std::string& out, const Constant& value);
 
-// A QUALIFIER for each that is selected. Flavors that are as usual are not written.
+// Appends a QUALIFIER for each that is selected, without flavors that have their default.
 void writeQualifiers(
     std::string& out, const QualifierList& qualifiers, const ObjectSelection& selection);
 
-// QUALIFIER.DECLARATION
+// Appends QUALIFIER.DECLARATION.
 void writeQualifierDeclaration(std::string& out, const QualifierDeclaration& declared);
 
 } // namespace Host::CimXml

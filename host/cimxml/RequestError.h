@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// What is wrong with a request as a message, before any operation is attempted.
+// Errors of a request as a message, before any operation is attempted.
 
 #pragma once
 
@@ -11,11 +11,11 @@
 
 namespace Host::CimXml {
 
-// What the answer's CIMError header says.
+// The values of the header CIMError (DSP0200).
 enum class Outcome {
     requestNotWellFormed,
-    requestNotLooselyValid, // something that must be there is not, or something stands elsewhere
-    requestNotValid,        // no request, or one beyond the limits
+    requestNotLooselyValid, // an element or attribute is missing or misplaced
+    requestNotValid,        // no request, or one beyond the bounds
     unsupportedCimVersion,
     unsupportedDtdVersion,
     unsupportedProtocolVersion,
@@ -23,7 +23,7 @@ enum class Outcome {
     unsupportedOperation, // an export message
 };
 
-// As the header writes it: request-not-well-formed and so on.
+// Returns the value as the header spells it, such as request-not-well-formed.
 std::string_view nameOf(Outcome outcome);
 
 // what() reads `line N, byte M: reason`.

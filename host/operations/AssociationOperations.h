@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Operations that follow associations from an instance, or from a class.
+// The operations on associations (DSP0200), from an instance or from a class.
 
 #pragma once
 
@@ -13,8 +13,8 @@ class Manager;
 class Repository;
 class Request;
 
-// Used from any thread. Each adds what it finds to the answer; they throw Refusal as the manager
-// does. From a class they lead to classes, as the associations declare them.
+// Thread-safe. Each adds the objects to return; throws Refusal as the manager does. From a class
+// they return classes, as the association classes declare them.
 class AssociationOperations {
 public:
     // Both must outlive it.

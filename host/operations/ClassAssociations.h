@@ -14,15 +14,15 @@ class Repository;
 struct ClassDeclaration;
 
 // An association class refers to the operation's class when one of its references is of that
-// class or of one above it, and has the role where one is given. Both functions answer in the
-// order of declaration, each class once, and throw Refusal (CMPI_RC_ERR_INVALID_CLASS) for a
-// class of the operation that is not known.
+// class or of one above it, and has the role where one is given. Both functions return each class
+// once, in the order of declaration, and throw Refusal (CMPI_RC_ERR_INVALID_CLASS) for a class of
+// the operation that is not known.
 
-// The classes of the other references, filtered as the operation of an instance would be.
+// Returns the classes of the other references, filtered by AssocClass, ResultClass and ResultRole.
 std::vector<const ClassDeclaration*> associatedClasses(
     const Repository& classes, const CimXml::Operation& operation);
 
-// The association classes themselves, of the result class or below it.
+// Returns the association classes themselves that are the result class or below it.
 std::vector<const ClassDeclaration*> referringClasses(
     const Repository& classes, const CimXml::Operation& operation);
 

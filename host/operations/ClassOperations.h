@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Operations on classes and qualifiers, answered by the repository.
+// The operations on classes and qualifiers (DSP0200), carried out on the repository.
 
 #pragma once
 
@@ -11,13 +11,13 @@ namespace Host {
 
 class Repository;
 
-// All may be called from any thread, and add what they find to the answer.
+// All are thread-safe and add the objects to return.
 
 // Throws Refusal (CMPI_RC_ERR_NOT_FOUND) when there is no such class.
 void getClass(const Repository& classes, const CimXml::Operation& operation, FoundObjects& found);
 
-// The classes below the named one, or all from the roots on. Throw Refusal
-// (CMPI_RC_ERR_INVALID_CLASS) for a class that is not known.
+// Add the subclasses of the named class, or those without superclass when none is named. Throw
+// Refusal (CMPI_RC_ERR_INVALID_CLASS) for a class that is not known.
 void enumerateClasses(
     const Repository& classes, const CimXml::Operation& operation, FoundObjects& found);
 void enumerateClassNames(

@@ -18,7 +18,7 @@ using Kind = CimXml::OperationKind;
 
 namespace {
 
-// CMPI has more codes than the protocol, for the talk between providers and brokers.
+// CMPI has codes beside those of DSP0200, for use between providers and brokers.
 CMPIrc statusCode(CMPIrc code)
 {
     constexpr auto last = CMPI_RC_ERR_QUERY_FEATURE_NOT_SUPPORTED;

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Takes each operation of the protocol to what carries it out.
+// Dispatches each operation to the component that carries it out.
 
 #pragma once
 
@@ -19,14 +19,14 @@ namespace Host {
 class Dispatcher : public CimXml::OperationHandler {
 public:
     // The host's name is for paths that do not have one of their own. Classes and manager must
-    // outlive the dispatcher and its answers.
+    // outlive the dispatcher and its responses.
     Dispatcher(const Repository& classes, Manager& manager, HostName hostName,
         const OperationLimits& limits = {},
         OpenEnumerations::Clock clock = std::chrono::steady_clock::now);
 
     // REQUIRES: no request is active on this thread.
-    // A failure is answered with the code of the Refusal it ends in; codes that are none of the
-    // protocol's become CIM_ERR_FAILED.
+    // An operation that ends in a Refusal returns an error response with its code; codes that
+    // DSP0200 does not have become CIM_ERR_FAILED.
     std::unique_ptr<CimXml::Response> answer(
         const CimXml::Message& message, const CimXml::Caller& caller) override;
 

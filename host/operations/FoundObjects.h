@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The objects that an operation has found, before they are written.
+// The objects that an operation returns, before they are written.
 
 #pragma once
 
@@ -21,7 +21,7 @@ class ObjectPath;
 struct ClassDeclaration;
 struct QualifierDeclaration;
 
-// The name of a class, for answers that hold no more of it.
+// The name of a class, for operations that return no more of it.
 struct ClassName {
     std::string_view text;
 };
@@ -30,17 +30,17 @@ struct ClassName {
 using FoundObject = std::variant<const Instance*, const ObjectPath*, const ClassDeclaration*,
     ClassName, const QualifierDeclaration*, Value>;
 
-// A run of objects, and a share in the memory they live in. That is given back as a whole, when
-// the last run of it goes; it makes no difference on which thread.
+// A range of objects that shares the memory they live in with other ranges of it. The memory is
+// freed as a whole with the last of them, on whichever thread.
 class FoundObjects {
 public:
     FoundObjects() : FoundObjects(nullptr) {}
     // The arena may be null when no object lives in one.
     explicit FoundObjects(std::shared_ptr<const Arena> arena);
 
-    // REQUIRES: nothing was taken yet.
+    // REQUIRES: takeFirst() was not called.
     void add(const FoundObject& object);
-    // The instances of the result and its paths.
+    // Adds the instances and paths of the result.
     void add(const CollectedResult& result);
 
     std::size_t size() const noexcept { return end_ - begin_; }
@@ -49,10 +49,10 @@ public:
         return store_->objects[begin_ + position];
     }
 
-    // The first ones, which are in here no more; fewer if there are not as many.
+    // Removes and returns that many objects from the beginning, or all if there are fewer.
     FoundObjects takeFirst(std::size_t count);
 
-    // How many objects the memory holds, with those that were taken.
+    // Returns the number of objects in the memory, with those that were taken.
     std::size_t heldObjects() const noexcept { return store_->objects.size(); }
 
 private:

@@ -7,8 +7,8 @@
 
 namespace Host {
 
-// Tells the name of the system that is served, at each request: it may change meanwhile. Called
-// from any thread.
+// Returns the current name of the system that is served, which may change between requests.
+// Thread-safe.
 using HostName = std::function<std::string()>;
 
 } // namespace Host

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Operations on instances and their properties, taken to the manager.
+// The operations on instances and their properties (DSP0200), dispatched to the manager.
 
 #pragma once
 
@@ -13,8 +13,8 @@ class Manager;
 class Repository;
 class Request;
 
-// Used from any thread. Each throws Refusal as the manager does, and adds what it finds to the
-// answer. The operation and its selection are as they are to be carried out.
+// Thread-safe. Each adds the objects to return; throws Refusal as the manager does. The operation
+// has its effective selection.
 class InstanceOperations {
 public:
     // Both must outlive it.

@@ -1,7 +1,7 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The objects of root/interop, in which the object manager describes itself to clients that look
-// around: its namespaces, itself and the profile it follows.
+// The objects of root/interop, in which the object manager describes itself to clients: its
+// namespaces, itself and the profile it implements.
 
 #pragma once
 
@@ -21,13 +21,13 @@ inline constexpr const char* namespaceClass = "CIM_Namespace";
 inline constexpr const char* objectManagerClass = "CIM_ObjectManager";
 inline constexpr const char* registeredProfileClass = "CIM_RegisteredProfile";
 
-// As they are at one moment.
+// A snapshot of the objects.
 class InteropObjects {
 public:
     // The classes must outlive the objects.
     InteropObjects(const Repository& classes, const std::string& hostName);
 
-    // Live as long as this object.
+    // Returns the instances of the class, which live as long as this object.
     std::vector<const Instance*> ofClass(std::string_view className) const;
 
 private:

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The provider of root/interop. It is part of the object manager and reached as others are.
+// The provider of root/interop, which is part of the object manager.
 
 #pragma once
 
@@ -17,7 +17,7 @@
 
 namespace Host {
 
-// Answers enumerations and get-instance, on any thread.
+// Enumerates and gets instances. Thread-safe.
 class InteropProvider {
 public:
     // The classes must outlive it.
@@ -27,10 +27,10 @@ public:
 
     CMPIInstanceMI& instanceMI() noexcept { return mi_; }
 
-    // As they are now.
+    // Returns the current objects.
     InteropObjects objects() const { return {classes_, hostName_()}; }
 
-    // Of the classes it serves; they name no library.
+    // Returns the registrations of the classes it serves, which name no library.
     static std::vector<ProviderRegistration> registrations();
 
 private:

@@ -9,11 +9,11 @@ namespace Host {
 class Repository;
 struct ClassDeclaration;
 
-// Throws Refusal (CMPI_RC_ERR_INVALID_CLASS) for a class that is not known.
+// Returns the class. Throws Refusal (CMPI_RC_ERR_INVALID_CLASS) when there is none of the name.
 const ClassDeclaration& knownClass(
     const Repository& classes, std::string_view nameSpace, std::string_view className);
 
-// The same; null for no name.
+// Returns the same; null for an empty name.
 const ClassDeclaration* findNamedClass(
     const Repository& classes, std::string_view nameSpace, std::string_view className);
 

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The embedded object manager as a whole, for whoever brings it the messages.
+// The embedded object manager as a whole.
 
 #pragma once
 
@@ -15,13 +15,13 @@ namespace Host {
 
 class ObjectManager : public CimXml::OperationHandler {
 public:
-    // Serves the registered classes, and root/interop by itself. Libraries are loaded when they
-    // are first needed, unless the manager was told to: one that cannot be used is the answer to
-    // an operation. The classes must outlive it, and it must outlive its answers.
+    // Serves the registered classes and root/interop. A library is loaded when it is first needed,
+    // unless the manager has loaded it before; operations on one that cannot be loaded fail. The
+    // classes must outlive the object manager, which must outlive its responses.
     ObjectManager(const Repository& classes, std::vector<ProviderRegistration> registrations,
         const HostName& hostName, const OperationLimits& limits = {});
 
-    // What answers the operations, for the process itself.
+    // The component that calls providers, for use within the process.
     Manager& manager() noexcept { return manager_; }
 
     std::unique_ptr<CimXml::Response> answer(

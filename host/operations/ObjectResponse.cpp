@@ -9,7 +9,7 @@ namespace Host {
 
 namespace {
 
-// What is appended at once, give or take an object: enough for few calls, little to hold.
+// The size of a piece, to which the last object in it adds.
 constexpr std::size_t portion = std::size_t{16} * 1024;
 
 // Appends an object as the writer does for its kind.
@@ -62,7 +62,7 @@ void ObjectResponse::finish(std::string& out)
     else
         writer_.finish(out);
     isFinished_ = true;
-    objects_ = {}; // whoever holds on to the response need not hold on to its objects
+    objects_ = {}; // frees them before the response is destroyed
 }
 
 bool WrittenResponse::append(std::string& out)

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Answers as a transport reads them.
+// Responses to operations.
 
 #pragma once
 
@@ -14,13 +14,14 @@
 
 namespace Host {
 
-// What operations that open an enumeration or pull say of the rest. Without a context there is
-// none: the sequence has ended.
+// The enumeration context that operations which open an enumeration or pull return; nothing at the
+// end of the sequence.
 struct Continuation {
     std::optional<std::string> context;
 };
 
-// Written object by object when pieces are asked for. Broker and repository must outlive it.
+// A response whose objects become XML when its pieces are asked for. Broker and repository must
+// outlive it.
 class ObjectResponse : public CimXml::Response {
 public:
     ObjectResponse(const CimXml::Message& message, CimXml::OperationKind kind,
@@ -28,7 +29,7 @@ public:
         FoundObjects objects, std::optional<Continuation> continuation);
 
     bool append(std::string& out) override;
-    // With those that earlier answers to pulls told, which are in the same memory.
+    // Counts those of earlier pulls too, which are in the same memory.
     std::size_t heldObjects() const noexcept override { return objects_.heldObjects(); }
 
 private:
@@ -41,7 +42,7 @@ private:
     bool isFinished_ = false;
 };
 
-// One that is written already, such as that of a failure.
+// A response that is written already, such as one of an error.
 class WrittenResponse : public CimXml::Response {
 public:
     explicit WrittenResponse(std::string text) : text_(std::move(text)) {}
@@ -50,7 +51,7 @@ public:
     std::size_t heldObjects() const noexcept override { return 0; }
 
 private:
-    std::string text_; // empty once it was read
+    std::string text_; // empty once it was appended
 };
 
 } // namespace Host

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Enumerations that clients have opened and pull bit by bit.
+// The enumerations that clients have opened and pull from (DSP0200).
 
 #pragma once
 
@@ -18,8 +18,8 @@
 
 namespace Host {
 
-// Whom an enumeration belongs to and what can be pulled from it. Nobody else gets anything, nor
-// learns that it is there.
+// The client that opened an enumeration, and what it pulls. Others neither pull from it nor learn
+// that it exists.
 struct EnumerationOwner {
     std::string principal;
     std::string nameSpace;
@@ -31,16 +31,14 @@ struct EnumerationOwner {
 struct OpenEnumeration {
     EnumerationOwner owner;
     FoundObjects waiting;
-    CimXml::ObjectSelection selection; // for what is pulled
-    std::chrono::seconds timeout{};    // from one operation on it to the next
+    CimXml::ObjectSelection selection; // for the objects that are pulled
+    std::chrono::seconds timeout{};    // between two operations on it
 };
 
-// May be used from any thread. Operations on one enumeration come one after another; what they
-// hand out is read without the lock.
+// Thread-safe. The objects that are pulled are read without the lock.
 //
-// Enumerations whose time is over are never found again, but their memory is given back only with
-// the next call, whichever it is: where no client comes any more, the last ones stay, within the
-// limits.
+// Enumerations that have timed out are never found again, but their memory is freed only with the
+// next call: where no client calls any more, the last ones stay, within the limits.
 class OpenEnumerations {
 public:
     using Clock = std::function<std::chrono::steady_clock::time_point()>;
@@ -48,8 +46,8 @@ public:
     explicit OpenEnumerations(
         const OperationLimits& limits, Clock clock = std::chrono::steady_clock::now);
 
-    // Returns the context by which clients know it: nobody can guess it. Throws Refusal:
-    // CMPI_RC_ERR_SERVER_LIMITS_EXCEEDED where it would be one too many or hold too much,
+    // Returns the enumeration context, which cannot be guessed. Throws Refusal:
+    // CMPI_RC_ERR_SERVER_LIMITS_EXCEEDED for one enumeration or object too many,
     // CMPI_RC_ERR_FAILED when the system has no random numbers.
     std::string open(OpenEnumeration enumeration);
 
@@ -59,13 +57,13 @@ public:
         bool isOver = false; // nothing is left; the enumeration is closed
     };
 
-    // So many of the objects that wait. Its time begins anew. Throw Refusal
-    // (invalidEnumerationContext) when there is no such enumeration of this owner.
+    // Returns at most that many of the remaining objects and restarts the timeout. Throws Refusal
+    // (invalidEnumerationContext) when the owner has no such enumeration.
     Pulled pull(const std::string& context, const EnumerationOwner& owner, std::size_t count);
-    // Whatever the owner pulls.
+    // Throws the same; what the owner pulls does not matter.
     void close(const std::string& context, const EnumerationOwner& owner);
 
-    // For calls that have to do with none of them.
+    // To be called with operations that use none of the enumerations.
     void removeExpired();
 
 private:

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Operations that open an enumeration, pull from it and close it.
+// The operations that open an enumeration, pull from it and close it (DSP0200).
 
 #pragma once
 
@@ -12,7 +12,7 @@
 
 namespace Host {
 
-// May be used from any thread.
+// Thread-safe.
 class PullOperations {
 public:
     explicit PullOperations(const OperationLimits& limits,
@@ -20,12 +20,12 @@ public:
 
     static bool isOpening(CimXml::OperationKind kind);
 
-    // To be called before anything is enumerated. Throws Refusal: filteredEnumerationNotSupported
-    // for a filter, continuationOnErrorNotSupported when the client wants to go on after errors,
-    // invalidOperationTimeout for a time that is too long, or for the 0 that stands for ever.
+    // Checks an operation that opens an enumeration before a provider is called. Throws Refusal:
+    // filteredEnumerationNotSupported for a filter, continuationOnErrorNotSupported for
+    // ContinueOnError, invalidOperationTimeout for one that is too long, or 0, which means none.
     void checkOpening(const CimXml::Operation& operation) const;
 
-    // Leaves in the answer what the client wants at once and keeps the rest for it. Throws what
+    // Leaves the objects for this response and keeps the rest to be pulled. Throws what
     // OpenEnumerations throws.
     Continuation open(
         const CimXml::Operation& operation, const std::string& principal, FoundObjects& found);
@@ -35,7 +35,7 @@ public:
         CimXml::Operation& operation, const std::string& principal, FoundObjects& found);
     void close(const CimXml::Operation& operation, const std::string& principal);
 
-    // Gives back the memory of enumerations whose time is over; to be called with all operations.
+    // Frees the memory of enumerations that have timed out. To be called with each operation.
     void removeExpired() { enumerations_.removeExpired(); }
 
 private:

@@ -29,7 +29,7 @@ bool leavesOutSubclasses(const Operation& operation)
            !operation.deepInheritance;
 }
 
-// For names of the client's: hashes of them could be made to meet.
+// An order, since a client could make names whose hashes collide.
 struct NameOrder {
     bool operator()(std::string_view a, std::string_view b) const
     {

@@ -10,8 +10,8 @@
 
 namespace Host {
 
-// Runs what delivers to a sink and adds all it has delivered. Throws Refusal (CMPI_RC_ERR_FAILED)
-// when something delivered was no object: an answer that lacks it would not be true.
+// Runs an operation that delivers to a sink and adds what it has delivered. Throws Refusal
+// (CMPI_RC_ERR_FAILED) when it could not deliver an object, which the response would lack.
 template <typename Operation>
 void addWhole(FoundObjects& found, const Operation& operation)
 {
