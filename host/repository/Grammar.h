@@ -32,10 +32,10 @@ struct ClosingQuote : peg::one<'"'> { static constexpr auto expected = "the clos
 struct Text : peg::plus<peg::one<'"'>, Piece, peg::must<ClosingQuote>, Blanks> { static constexpr auto expected = "a string"; };
 struct Digits : peg::sor<peg::one<'0'>, peg::seq<peg::range<'1', '9'>, peg::star<peg::digit>>> {};
 struct Number : peg::seq<peg::opt<peg::one<'-'>>, Digits, peg::not_at<peg::identifier_other>> {};
-struct True : Keyword<TAO_PEGTL_ISTRING("true")> {};
-struct False : Keyword<TAO_PEGTL_ISTRING("false")> {};
-struct Null : Keyword<TAO_PEGTL_ISTRING("null")> {};
-struct Literal : peg::sor<Text, peg::seq<Number, Blanks>, True, False, Null> {
+struct True : TAO_PEGTL_ISTRING("true") {};
+struct False : TAO_PEGTL_ISTRING("false") {};
+struct Null : TAO_PEGTL_ISTRING("null") {};
+struct Literal : peg::sor<Text, peg::seq<Number, Blanks>, Keyword<True>, Keyword<False>, Keyword<Null>> {
     static constexpr auto expected = "a string, decimal number, true, false or null";
 };
 struct ListEnd : Mark<'}'> { static constexpr auto expected = ", or } in the list"; };

@@ -127,6 +127,13 @@ TEST(DeclarationTest, IntegersReachTheEndsOfTheirTypes)
         constant(std::numeric_limits<std::int64_t>::min()));
 }
 
+TEST(DeclarationTest, BlanksAndCommentsMayFollowAnyValue)
+{
+    EXPECT_EQ(defaultOf("boolean P", "true // not false\n"), constant(true));
+    EXPECT_EQ(defaultOf("boolean P", "FALSE "), constant(false));
+    EXPECT_EQ(defaultOf("uint8 P", "1 "), constant(std::uint64_t{1}));
+}
+
 TEST(DeclarationTest, AdjacentStringsAreOne)
 {
     EXPECT_EQ(defaultOf("string P", R"("")"), constant(std::string()));
