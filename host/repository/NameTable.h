@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// A map by CIM names, which are the same in upper and lower case.
+// A map whose keys are CIM names, compared without regard to letter case.
 
 #pragma once
 

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// What is declared in one namespace.
+// The classes and qualifiers that are declared in one namespace.
 
 #pragma once
 
@@ -21,7 +21,7 @@ public:
 
     const std::string& name() const noexcept { return name_; }
 
-    // Null when there is none of that name.
+    // Return null when there is none of that name.
     const ClassDeclaration* findClass(std::string_view className) const;
     const QualifierDeclaration* findQualifier(std::string_view qualifierName) const;
 

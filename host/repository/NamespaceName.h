@@ -7,8 +7,8 @@
 
 namespace Host {
 
-// The name without slashes at its ends, such as root/cimv2; empty unless it is made of CIM names
-// with single slashes between them.
+// Returns the name without slashes at its ends, such as root/cimv2; empty unless it consists of
+// CIM names with single slashes between them (DSP0004, 5.2.3).
 std::string plainNamespaceName(std::string_view name);
 
 } // namespace Host

@@ -69,22 +69,6 @@ std::vector<const ClassDeclaration*> Repository::subclasses(
     return found;
 }
 
-std::vector<const ClassDeclaration*> Repository::ancestors(
-    std::string_view nameSpace, std::string_view className) const
-{
-    std::vector<const ClassDeclaration*> found;
-    if (const ClassDeclaration* const declared = findClass(nameSpace, className))
-        for (auto above = declared->superclass; above != nullptr; above = above->superclass)
-            found.push_back(above);
-    return found;
-}
-
-bool Repository::isAssociation(std::string_view nameSpace, std::string_view className) const
-{
-    const ClassDeclaration* const declared = findClass(nameSpace, className);
-    return declared != nullptr && declared->isAssociation;
-}
-
 const std::vector<std::string>* Repository::keysOf(
     std::string_view nameSpace, std::string_view className) const
 {

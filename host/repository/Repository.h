@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The classes and qualifier declarations of a host, as the compiler has made them.
+// The classes and qualifiers of all namespaces, as the compiler declared them.
 
 #pragma once
 
@@ -14,9 +14,8 @@
 
 namespace Host {
 
-// Names of namespaces, classes and qualifiers are looked up without regard to letter case;
-// answers spell them as they are declared. Never changes: any thread may ask at any time,
-// without locks, and what it is given lives as long as the repository.
+// Finds namespaces, classes and qualifiers by name in any letter case. A repository is immutable:
+// any thread may call it at any time, and what it returns lives as long as the repository.
 class Repository : public ClassInformation {
 public:
     explicit Repository(std::vector<std::unique_ptr<Namespace>> namespaces);
@@ -27,7 +26,7 @@ public:
         return namespaces_;
     }
 
-    // Null when the namespace is not known or has nothing of that name.
+    // Return null when the namespace is not known or has nothing of that name.
     const Namespace* findNamespace(std::string_view nameSpace) const;
     const ClassDeclaration* findClass(std::string_view nameSpace, std::string_view className) const;
     const QualifierDeclaration* findQualifier(
@@ -35,17 +34,11 @@ public:
 
     enum class Depth { direct, deep };
 
-    // The classes below one, in the order of their declaration within each class; deep, each
-    // class stands before its own subclasses. For an empty class name, those from the roots
-    // on. Empty when the namespace or the class is not known.
+    // Returns the subclasses of a class in the order of their declaration; with Depth::deep, each
+    // is followed by its own subclasses. An empty class name stands for a superclass of all
+    // roots. Returns nothing when the namespace or the class is not known.
     std::vector<const ClassDeclaration*> subclasses(
         std::string_view nameSpace, std::string_view className, Depth depth) const;
-
-    // The superclass first, the root last.
-    std::vector<const ClassDeclaration*> ancestors(
-        std::string_view nameSpace, std::string_view className) const;
-
-    bool isAssociation(std::string_view nameSpace, std::string_view className) const;
 
     const std::vector<std::string>* keysOf(
         std::string_view nameSpace, std::string_view className) const override;

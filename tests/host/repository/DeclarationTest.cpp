@@ -33,7 +33,7 @@ TEST(DeclarationTest, KeywordsAndTypesMayBeWrittenInAnyCase)
         CLASS A { UINT8 P = NULL; };
         [ASSOCIATION] Class B { A REF One; A Ref Two; };
         clASs C : a { Boolean Q = True; };)");
-    EXPECT_TRUE(repository->isAssociation(NameSpace, "B"));
+    EXPECT_TRUE(classNamed(*repository, "B").isAssociation);
     EXPECT_EQ(classNamed(*repository, "C").superclass->name, "A");
 }
 

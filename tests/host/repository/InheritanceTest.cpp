@@ -93,8 +93,8 @@ TEST(InheritanceTest, AssociationsPassThatOnToTheirSubclasses)
         class A {};
         [Association] class L { A ref One; A ref Two; };
         class M : L { };)");
-    EXPECT_TRUE(repository->isAssociation(NameSpace, "M"));
-    EXPECT_FALSE(repository->isAssociation(NameSpace, "A"));
+    EXPECT_TRUE(classNamed(*repository, "M").isAssociation);
+    EXPECT_FALSE(classNamed(*repository, "A").isAssociation);
 }
 
 TEST(QualifierPropagationTest, RestrictedQualifiersEndWithTheirClass)

@@ -69,13 +69,6 @@ TEST_F(RepositoryTest, listsTheRootsForNoClass)
     EXPECT_THAT(repository_->subclasses("root", "", Depth::deep), IsEmpty());
 }
 
-TEST_F(RepositoryTest, listsAncestorsFromNearToFar)
-{
-    EXPECT_THAT(names(repository_->ancestors(NameSpace, "leftone")), ElementsAre("Left", "Top"));
-    EXPECT_THAT(repository_->ancestors(NameSpace, "Top"), IsEmpty());
-    EXPECT_THAT(repository_->ancestors(NameSpace, "None"), IsEmpty());
-}
-
 TEST_F(RepositoryTest, tellsDescentAtAnyDistance)
 {
     EXPECT_TRUE(repository_->isDerivedFrom(NameSpace, "LeftOne", "TOP"));
@@ -103,7 +96,6 @@ TEST_F(RepositoryTest, listsReferencesOfAssociationsOnly)
     EXPECT_EQ(references[1].className, "Other");
     EXPECT_THAT(repository_->referencesOf(NameSpace, "Top"), IsEmpty());
     EXPECT_THAT(repository_->referencesOf(NameSpace, "None"), IsEmpty());
-    EXPECT_FALSE(repository_->isAssociation(NameSpace, "None"));
 }
 
 TEST_F(RepositoryTest, keysAreTheSameListAtEveryRequest)
