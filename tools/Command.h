@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// One subcommand: its part of the command line, and its work.
+// A subcommand of sensorctl.
 
 #pragma once
 
@@ -15,11 +15,11 @@ class Output;
 enum class ExitCode {
     success = 0,
     failure = 1,      // a message on standard error says why
-    wrongUsage = 2,   // the command line makes no sense
+    wrongUsage = 2,   // the command line is invalid
     nothingFound = 3, // all went well, but there is nothing to show
 };
 
-// A subclass adds its options to the parser when it is made, and reads them when it runs.
+// A subclass adds its options to the parser in its constructor and reads them in run().
 class Command {
 public:
     // Adds the subcommand to the tool's command line, which must outlive it.
@@ -30,8 +30,8 @@ public:
 
     bool isChosen() const;
 
-    // Does the work. Throws std::exception with the text for the user when it fails, UsageError
-    // when the reason is what was typed.
+    // Throws UsageError for an invalid command line and another std::exception for any other
+    // failure, with a text for the user.
     virtual ExitCode run(Output& out) = 0;
 
 protected:

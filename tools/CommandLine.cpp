@@ -29,7 +29,7 @@ constexpr std::size_t columnOfDescriptions = 22; // in the help
 constexpr const char* footer = "Exit codes: 0 success, 1 failure, 2 wrong usage, 3 nothing found.\n"
                                "`sensorctl COMMAND --help` tells more about a command.";
 
-// CMPI counts its versions in hundreds.
+// CMPI_VERSION is a hundred times the version.
 std::string versionText()
 {
     constexpr int cmpi = CMPI_VERSION;

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// What to tell a user who got nothing.
+// Messages for a user when there is nothing to show.
 
 #pragma once
 
@@ -12,21 +12,21 @@
 
 namespace Tools {
 
-// How many sensors the machine has, seen without a provider. REQUIRES: no provider is loaded any
-// more, since it may share libraries with this look. Throws std::runtime_error with the reason
-// when the machine cannot be read.
+// Returns the number of the machine's sensors, counted without a provider. Throws
+// std::runtime_error with the reason when the machine cannot be read.
+// REQUIRES: no provider is loaded, since it may share libraries with this function.
 std::size_t countSensors();
 
-// A provider answers with nothing both when a machine has no sensors and when they cannot be
-// read. Returns in the first case, throws std::runtime_error with the reason in the second.
-// REQUIRES: as above.
+// Throws std::runtime_error with the reason when sensors exist or cannot be read. Providers return
+// an empty answer in that case as well as for a machine without sensors.
+// REQUIRES: no provider is loaded.
 void checkMachineIsEmpty();
 
-// Says on standard error that the machine, or the model file, has no sensors.
+// Writes to standard error that the machine, or the model file, has no sensors.
 ExitCode complainOfEmptyMachine(const std::optional<std::string>& model);
 
-// Says there that no object is the one the user means, or that there are none to choose from.
-// REQUIRES and throws as checkMachineIsEmpty does when the machine is empty.
+// Writes to standard error that no object matches, or that the machine has no sensors. Calls
+// checkMachineIsEmpty() in the second case.
 ExitCode complainOfNoObject(
     const std::string& wanted, bool isMachineEmpty, const std::optional<std::string>& model);
 

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The object that a user means.
+// Finds the object that a user names.
 
 #pragma once
 
@@ -16,12 +16,12 @@ class ProviderClient;
 
 struct ObjectFound {
     const Host::Instance* object = nullptr; // null when there is none
-    bool isMachineEmpty = false;            // there are no sensors at all to choose from
+    bool isMachineEmpty = false;            // the machine has no sensors
 };
 
-// By its object path, by DeviceID, by the name of a sensor or by InstanceID, whichever fits
-// first. Throws UsageError for a path with a mistake in it, and std::runtime_error when several
-// sensors have the name or when a provider fails.
+// Finds an object by object path, DeviceID, name of a sensor or InstanceID, in this order. Throws
+// UsageError for a malformed path, and std::runtime_error when several sensors have the name or a
+// provider fails.
 ObjectFound findObject(ProviderClient& provider, const std::string& wanted);
 
 } // namespace Tools

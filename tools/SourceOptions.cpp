@@ -30,7 +30,7 @@ void SourceOptions::selectMachine() const
 {
     if (!model_)
         return;
-    // The provider would answer a model it cannot read with nothing.
+    // A provider returns an empty answer for a model that it cannot read.
     Vorn::checkMachineFile(*model_);
     const std::string entry =
         Vorn::formatSourceEntry("model", std::filesystem::absolute(*model_).string());
@@ -39,7 +39,7 @@ void SourceOptions::selectMachine() const
 
 ProviderFiles SourceOptions::providerFiles() const
 {
-    // With its folder, lest the loader search for it.
+    // The loader would search its own folders for a name without a slash.
     return {provider_ ? std::filesystem::absolute(*provider_).string() : findProviderFile(),
         findComputerSystemProviderFile()};
 }

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Which machine is shown, and through which provider libraries.
+// The options that select the machine and the provider libraries.
 
 #pragma once
 
@@ -24,12 +24,12 @@ public:
 
     const std::optional<std::string>& model() const { return model_; }
 
-    // Makes the model file, if one was given, the machine of this process: to be called before
-    // a provider is loaded and before there are other threads. Throws std::runtime_error
-    // naming the file, the place in it and the reason when it is no model.
+    // Makes this process read the model file, if one is given. Throws std::runtime_error with the
+    // file, the place in it and the reason when it is no model.
+    // REQUIRES: no provider is loaded, and there are no other threads.
     void selectMachine() const;
 
-    // Throws std::runtime_error when no library was given and none is found.
+    // Throws std::runtime_error when no library is given and none is found.
     ProviderFiles providerFiles() const;
 
 private:

@@ -6,7 +6,7 @@
 
 namespace Tools {
 
-// What the user typed makes no sense; the text says what and why.
+// An invalid command line; the text says what is wrong with it.
 class UsageError : public std::runtime_error {
 public:
     using std::runtime_error::runtime_error;

@@ -17,7 +17,7 @@ class ObjectPath;
 
 namespace Tools {
 
-// Looks at paths and instances that must outlive it.
+// Refers to paths and instances that must outlive it.
 class AssociationGraph {
 public:
     using Index = std::size_t;
@@ -31,16 +31,16 @@ public:
 
     static constexpr std::size_t unreachable = std::numeric_limits<std::size_t>::max();
 
-    // Links what the references of an association instance name, each to every other.
+    // Links the objects that an association instance refers to, each to every other.
     void add(const Host::Instance& association);
 
-    // The object's place; it is made when no association names the object.
+    // Returns the object's index. Adds the object when no association refers to it.
     Index indexOf(const Host::ObjectPath& path);
 
     const Host::ObjectPath& path(Index object) const { return *objects_[object].path; }
     const std::vector<Link>& links(Index object) const { return objects_[object].links; }
 
-    // For each object the least number of links to it from the given one.
+    // Returns, for each object, the least number of links to it from the given one.
     std::vector<std::size_t> distancesFrom(Index object) const;
 
 private:

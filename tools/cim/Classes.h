@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The classes that the tool's object manager knows.
+// The classes of the tool's object manager.
 
 #pragma once
 
@@ -10,9 +10,9 @@
 
 namespace Tools {
 
-// Compiled from the MOF files that belong to this tool, which lie in ../share/sensor-profile as
-// seen from its executable. Throws std::runtime_error naming the file and the place in it when
-// they are not there or cannot be compiled.
+// Compiles the MOF files that are installed with the tool, in ../share/sensor-profile relative to
+// its executable. Throws std::runtime_error with the file, and the place in it, when they are
+// missing or cannot be compiled.
 std::unique_ptr<const Host::Repository> compileClasses();
 
 } // namespace Tools

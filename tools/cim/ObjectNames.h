@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Short texts for objects, as they came from the provider: not yet fit for a terminal.
+// Short texts that identify objects, as the provider spells them: not yet printable.
 
 #pragma once
 
@@ -13,15 +13,15 @@ class ObjectPath;
 
 namespace Tools {
 
-// What tells an object from others of its class: its DeviceID, InstanceID or Name, else its
-// whole path.
+// Returns the key that identifies an object within its class: its DeviceID, InstanceID or Name,
+// else its whole path.
 std::string shortName(const Host::ObjectPath& path);
 
-// The ElementName, else the class.
+// Returns the ElementName, else the name of the class.
 std::string nameOf(const Host::Instance& instance);
 
-// Equal for two paths that name the same object, however each is written and whichever host
-// and namespace it names.
+// Returns a text that is equal for two paths of the same object, in whatever order and letter case
+// they are written; host and namespace do not count.
 std::string identityOf(const Host::ObjectPath& path);
 
 } // namespace Tools

@@ -21,7 +21,7 @@ namespace {
 
 constexpr unsigned deepest = Host::Value::maximumNesting - 1;
 
-// Where the parts of a path lie.
+// The parts of a path, as views of its text.
 struct Parts {
     std::string_view host;
     std::string_view nameSpace;
@@ -29,8 +29,8 @@ struct Parts {
     std::string_view keys; // what follows the dot
 };
 
-// The text before its first such character, which is taken off with it. Nothing is taken when
-// there is none.
+// Removes the text up to the first delimiter and returns what stands before it. Removes and
+// returns nothing when there is no delimiter.
 std::string_view takeBefore(std::string_view& text, char delimiter)
 {
     const auto place = text.find(delimiter);
@@ -48,7 +48,7 @@ Parts partsOf(std::string_view text)
         text.remove_prefix(2);
         parts.host = takeBefore(text, '/');
     }
-    // Values may hold any character; what stands before them has no quotes.
+    // A colon within a quoted value ends no namespace.
     if (const auto colon = text.find(':'); colon < text.find('"'))
         parts.nameSpace = takeBefore(text, ':');
     parts.className = takeBefore(text, '.');
@@ -56,12 +56,12 @@ Parts partsOf(std::string_view text)
     return parts;
 }
 
-// Reads the keys of one path; mistakes are told of with their column in the text.
+// Reads the keys of one path. Throws UsageError with the column in the text.
 class KeyReader {
 public:
     KeyReader(std::string_view text, std::string_view keys) : text_(text), rest_(keys) {}
 
-    // Visits each key with its name, its text and whether that stands in quotes.
+    // Calls the visitor for each key with its name, its text and whether that is quoted.
     template <typename Visit>
     void read(const Visit& visit)
     {
@@ -75,7 +75,7 @@ public:
             fail(rest_, "expected a comma or the end");
     }
 
-    // Complains of the value that is being visited.
+    // Throws UsageError for the value that is being visited.
     [[noreturn]] void refuseValue(const std::string& reason) const { fail(begin_, reason); }
 
 private:
@@ -138,7 +138,7 @@ std::optional<Number> numberIn(std::string_view text)
     return number;
 }
 
-// Nothing for what is no number and no truth value.
+// Returns nothing for a text that is neither a number nor a boolean.
 std::optional<Host::Value> plainValue(std::string_view text)
 {
     if (const auto number = numberIn<std::uint64_t>(text))

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Object paths as people type and paste them.
+// Object paths as users type and paste them.
 
 #pragma once
 
@@ -18,8 +18,8 @@ namespace Tools {
 // host and namespace may be left out and references are paths in quotes. The namespace is
 // root/cimv2 when none is given.
 //
-// Null when the text does not name a known class where a path has its class: then it is meant
-// as something else. Throws UsageError, with the column, when it does and is no path.
+// Returns null when the text does not name a known class where a path has its class: it is not
+// meant as a path. Throws UsageError with the column when it names one and is malformed.
 const Host::ObjectPath* readPath(
     Host::Arena& arena, const Host::ClassInformation& classes, std::string_view text);
 

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The providers under the embedded object manager, asked as a CIM client asks.
+// A client of the providers, through the embedded object manager.
 
 #pragma once
 
@@ -29,32 +29,30 @@ struct ProviderFiles {
 
 using Instances = std::vector<const Host::Instance*>;
 
-// One request from its making to its end: the objects it returns last as long as it does.
-// Stays on the stack; one at a time. It throws std::runtime_error when the classes cannot be
-// compiled, its operations when a library cannot be used, when a provider answers with an error or
-// leaves a part of its answer out.
+// Owns one request and the objects that it returns. At most one client may exist at a time. The
+// constructor throws std::runtime_error when the classes cannot be compiled, the operations when
+// a library cannot be used, a provider returns an error or its answer is incomplete.
 class ProviderClient {
 public:
     explicit ProviderClient(const ProviderFiles& files);
 
-    // The class's name as it is declared; nothing for a class that is not known.
+    // Returns the class's name as it is declared; nothing for an unknown class.
     std::optional<std::string> declaredClass(std::string_view className) const;
-    // For messages: those that are served here.
+    // Return the names of the served classes, and of the associations among them.
     const std::vector<std::string>& servedClasses() const { return served_; }
-    // Those of them that are associations.
     const std::vector<std::string>& associationClasses() const { return associations_; }
 
-    // Of the class and those below it, in the provider's order.
+    // Returns the instances of the class and its subclasses in the provider's order.
     Instances instances(const std::string& className);
-    // Null when there is none.
+    // Returns null when there is none.
     const Host::Instance* instance(const Host::ObjectPath& path);
 
     Instances sensors() { return instances(sensorClass); }
-    // Null when there is none with that DeviceID.
+    // Returns null when there is none with that DeviceID.
     const Host::Instance* sensor(std::string_view deviceId);
 
-    // The path that the text means, in the request; null when it is no path of a known class.
-    // Throws UsageError when it is one with a mistake in it.
+    // Returns the path, which the request owns, or null when the text is no path of a known class.
+    // Throws UsageError when the path is malformed.
     const Host::ObjectPath* readPath(std::string_view text) const;
 
 private:

@@ -14,8 +14,8 @@ namespace {
 constexpr const char* sensorLibrary = "libSensorProfileProvider.so";
 constexpr const char* computerSystemLibrary = "libComputerSystemProvider.so";
 
-// From the folder of the tool's executable; object managers look for providers in `cmpi`
-// folders. The architecture is Debian's name for it, such as x86_64-linux-gnu.
+// Relative to the folder of the tool's executable. Object managers load providers from `cmpi`
+// folders; SENSOR_PROFILE_ARCHITECTURE is Debian's name, such as x86_64-linux-gnu.
 constexpr std::array folders = {"../lib", "../lib/cmpi", "../lib/" SENSOR_PROFILE_ARCHITECTURE,
     "../lib/" SENSOR_PROFILE_ARCHITECTURE "/cmpi", "../lib64", "../lib64/cmpi"};
 

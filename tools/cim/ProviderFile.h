@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Where the provider libraries lie.
+// The paths of the provider libraries.
 
 #pragma once
 
@@ -9,12 +9,13 @@
 
 namespace Tools {
 
-// The libraries that belong to this tool, found by the tool's own place: in a build folder, or
-// where an installation puts them.
+// Both functions search relative to the tool's executable: in a build folder, and where an
+// installation puts the libraries.
 
-// Of the sensors. Throws std::runtime_error naming the folders looked into.
+// Throws std::runtime_error with the searched folders when the library of the sensors is missing.
 std::string findProviderFile();
-// Of the computer system; nothing when it is not installed, since others may serve that class.
+// Returns nothing when the library of the computer system is not installed: another provider may
+// serve that class.
 std::optional<std::string> findComputerSystemProviderFile();
 
 } // namespace Tools

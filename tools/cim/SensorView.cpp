@@ -14,7 +14,7 @@ namespace Tools {
 
 namespace {
 
-// What a reading or limit becomes that is no number or does not fit.
+// The provider's value of a reading or limit that is no number or does not fit.
 constexpr std::int64_t unrepresentable = std::numeric_limits<std::int32_t>::min();
 
 constexpr std::uint64_t noContact = 12;
@@ -23,7 +23,7 @@ constexpr std::uint64_t lostCommunication = 13;
 constexpr std::int64_t disabled = 3;
 constexpr std::int64_t offline = 6;
 
-// Short texts for the operational statuses that CurrentState has no label for.
+// Texts for the operational statuses that CurrentState has no label for.
 struct Label {
     std::uint64_t status;
     std::string_view text;
@@ -107,7 +107,7 @@ std::string_view SensorView::state() const
 
 Health SensorView::health() const
 {
-    // CIM_ManagedSystemElement.HealthState
+    // The codes are those of CIM_ManagedSystemElement.HealthState.
     const std::int64_t state = number("HealthState").value_or(0);
     if (state >= 15)
         return Health::critical;

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// One ZUMLO_NumericSensor instance, read by meaning instead of by property.
+// A ZUMLO_NumericSensor instance, interpreted.
 
 #pragma once
 
@@ -17,8 +17,8 @@ namespace Tools {
 
 enum class Health { unknown, ok, warning, critical };
 
-// Looks at an instance that must outlive it. Texts come as the provider sent them, not yet fit
-// for a terminal; numbers come scaled to the base unit, such as "12.345".
+// Refers to an instance that must outlive it. Texts are returned as the provider spells them, not
+// yet printable; numbers are scaled to the base unit, such as "12.345".
 class SensorView {
 public:
     explicit SensorView(const Host::Instance& instance) : instance_(instance) {}
@@ -26,23 +26,23 @@ public:
     std::string_view name() const { return text("ElementName"); }
     std::string_view deviceId() const { return text("DeviceID"); }
 
-    // Nothing when the sensor delivers no value. CurrentReading is there even then, as 0, and
-    // has to be told from a true 0: it means nothing when the sensor has lost communication
-    // (OperationalStatus 13), nor when it is 0 and the sensor is out of contact
-    // (OperationalStatus 12), disabled or offline (EnabledState 3 or 6).
+    // Returns nothing when the sensor delivers no value: when CurrentReading is missing or out of
+    // range, when communication is lost (OperationalStatus 13), and when CurrentReading is 0 and
+    // the sensor is out of contact (OperationalStatus 12), disabled or offline (EnabledState 3 or
+    // 6).
     std::optional<std::string> reading() const;
 
-    // Empty when the unit is not known.
+    // Returns an empty text for an unknown unit.
     std::string_view unit() const;
 
-    // CurrentState; where that says nothing, what OperationalStatus says. Empty when neither
-    // does.
+    // Returns CurrentState; where that is empty or unknown, a text for OperationalStatus if there
+    // is one.
     std::string_view state() const;
 
     Health health() const;
 
-    // The limit of that property, exactly or rounded to hundredths; nothing when the sensor has
-    // none.
+    // Return the limit in that property, exactly or rounded to hundredths; nothing when the sensor
+    // has none.
     std::optional<std::string> limit(std::string_view property) const;
     std::optional<std::string> roundedLimit(std::string_view property) const;
 

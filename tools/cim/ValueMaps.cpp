@@ -12,7 +12,7 @@ namespace {
 
 using Texts = std::span<const std::string_view>;
 
-// Each text stands at the place of its code.
+// The index of each text is its code.
 constexpr std::array<std::string_view, 17> sensorTypes = {"Unknown", "Other", "Temperature",
     "Voltage", "Current", "Tachometer", "Counter", "Switch", "Lock", "Humidity", "Smoke Detection",
     "Presence", "Air Flow", "Power Consumption", "Power Production", "Pressure", "Intrusion"};

@@ -9,8 +9,8 @@
 
 namespace Tools {
 
-// The text that the value map of the property has for the code; empty when the property has no
-// map or the code no text.
+// Returns the text of the property's value map for the code; empty when the property has no map or
+// the code no text.
 std::string_view meaningOf(std::string_view property, std::uint64_t code);
 
 } // namespace Tools

@@ -44,7 +44,7 @@ public:
     }
 
 private:
-    // False when there is no such object; isEmpty says whether there are no sensors at all.
+    // Returns false when there is no such object; sets isEmpty when the machine has no sensors.
     bool show(Output& out, bool& isEmpty) const
     {
         ProviderClient provider(source_.providerFiles());

@@ -61,7 +61,7 @@ public:
     }
 
 private:
-    // False when there are none.
+    // Returns false when the class has no objects.
     bool show(Output& out)
     {
         ProviderClient provider(source_.providerFiles());

@@ -46,7 +46,7 @@ public:
         const ExitCode code = show(out, isMachineEmpty);
         if (code == ExitCode::nothingFound)
             return complainOfNothing(isMachineEmpty);
-        // A provider that cannot read the machine shows one without sensors.
+        // A provider that cannot read the machine returns no sensors; this call throws then.
         countSensors();
         return code;
     }
@@ -75,7 +75,7 @@ private:
         return found.object == nullptr ? Instances{} : Instances{found.object};
     }
 
-    // What one class fails to tell takes nothing from the tree of the others; false then.
+    // Returns false when a class fails. The tree still shows the associations of the others.
     static bool addAssociations(ProviderClient& provider, AssociationGraph& graph)
     {
         bool isWhole = true;

@@ -1,8 +1,7 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The C library knows widths only in a UTF-8 locale, which a server's tool cannot count on.
-// These ranges cover the scripts in use, from Unicode's East_Asian_Width (W and F) and the
-// general categories of marks that take no room of their own.
+// The C library returns widths only in a UTF-8 locale, which a server may not have. These ranges
+// are those of Unicode's East_Asian_Width (W and F) and of marks without a width of their own.
 
 #include "tools/output/Utf8.h"
 
@@ -19,7 +18,7 @@ struct Range {
     char32_t last;
 };
 
-// Both ascending, ranges not touching.
+// The ranges of both tables are ascending and disjoint.
 constexpr std::array zeroWidth = {Range{0x0300, 0x036F}, // combining diacritical marks
     Range{0x0483, 0x0489}, Range{0x0591, 0x05BD}, Range{0x0610, 0x061A}, Range{0x064B, 0x065F},
     Range{0x06D6, 0x06DC}, Range{0x0900, 0x0902}, Range{0x0941, 0x0948}, Range{0x0E31, 0x0E31},

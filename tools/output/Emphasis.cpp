@@ -6,7 +6,7 @@ namespace Tools {
 
 namespace {
 
-// Select Graphic Rendition (ECMA-48), in the palette the terminal's owner has chosen.
+// Returns the control sequence Select Graphic Rendition (ECMA-48), in the terminal's own palette.
 const char* startOf(Emphasis emphasis)
 {
     switch (emphasis) {

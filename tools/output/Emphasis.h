@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Colours on a terminal, by what they say.
+// Colors on a terminal by their meaning.
 
 #pragma once
 
@@ -10,7 +10,7 @@ namespace Tools {
 
 enum class Emphasis { none, heading, faint, good, warning, critical };
 
-// The text with the terminal's codes around it; the text alone when it is not colored.
+// Returns the text between the terminal's control sequences; the text alone unless it is colored.
 std::string emphasized(const std::string& text, Emphasis emphasis, bool isColored);
 
 } // namespace Tools

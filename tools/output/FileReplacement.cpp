@@ -37,7 +37,7 @@ public:
 
     int number() const { return number_; }
 
-    // Closing is where some file systems first say that the disk is full.
+    // Reports the error of close(): some file systems report a full disk only there.
     void close()
     {
         const int number = number_;
@@ -49,7 +49,7 @@ private:
     int number_;
 };
 
-// A file beside the target, removed again unless it takes the target's place.
+// A file beside the target that is removed unless it replaces the target.
 class Replacement {
 public:
     explicit Replacement(const std::string& target)

@@ -28,7 +28,7 @@ constexpr int indentation = 2;
 
 Json arrayOf(const Host::Array& array);
 
-// JSON's null for a null, and for a number that JSON cannot hold.
+// Returns JSON's null for a null and for a number that is not finite.
 Json jsonOf(const Host::Value& value)
 {
     if (const auto text = value.text())
@@ -69,7 +69,7 @@ Json jsonOf(const Host::Instance& instance)
     return {{"path", instance.objectPath().toText()}, {"properties", std::move(properties)}};
 }
 
-// Its lines indented by the depth at which it stands; texts hold no line feeds.
+// Serializes the value with its lines indented by the depth. No string contains a line feed.
 std::string serialized(const Json& json, std::size_t depth)
 {
     const std::string text =
@@ -85,7 +85,8 @@ std::string serialized(const Json& json, std::size_t depth)
 
 } // namespace
 
-// Instance by instance: the whole document of a large machine need not be in memory.
+// Writes instance by instance, so that the document of a large machine is never in memory as a
+// whole.
 void writeJson(
     Output& out, std::string_view className, const std::vector<const Host::Instance*>& instances)
 {

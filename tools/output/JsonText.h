@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// JSON that is safe to look at.
+// JSON that is safe to print.
 
 #pragma once
 
@@ -9,9 +9,9 @@
 
 namespace Tools {
 
-// The same document, with a JSON escape for each character above ASCII's controls that a
-// terminal might obey; a serializer escapes only those below. Outside of its texts JSON is
-// ASCII, so that every such character stands where it may be escaped. REQUIRES: valid JSON.
+// Replaces each unprintable character beyond ASCII's controls, which a serializer escapes, by a
+// JSON escape. Such characters occur only within strings, where escapes are valid (RFC 8259).
+// REQUIRES: valid JSON.
 std::string escapeUnprintable(std::string_view json);
 
 } // namespace Tools

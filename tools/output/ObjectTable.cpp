@@ -24,7 +24,7 @@ namespace {
 
 using Objects = std::vector<const Host::Instance*>;
 
-// Beside the references, which have other names in each class, in this order.
+// The columns after those of the references, which have other names in each class.
 constexpr std::array<std::string_view, 7> shownProperties = {"DeviceID", "InstanceID", "Name",
     "ElementName", "EnabledState", "HealthState", "OperationalStatus"};
 

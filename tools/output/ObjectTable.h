@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Objects of any class, a line each.
+// A table of objects of any class.
 
 #pragma once
 
@@ -14,9 +14,8 @@ class Instance;
 
 namespace Tools {
 
-// What tells the objects apart and how they are: their identifying keys (what associations
-// refer to by its short name), names and states, as far as any of the objects has them; the
-// class, too, where they are of several.
+// Returns a table with the identifying keys (of associations, the short names of their ends),
+// names and states that any of the objects has; also the class where there are several.
 std::string objectTable(
     const std::vector<const Host::Instance*>& objects, std::size_t width, bool isColored);
 

@@ -17,7 +17,7 @@ namespace {
 using Index = AssociationGraph::Index;
 using Link = AssociationGraph::Link;
 
-// What stands before an object, and before those below it. All are equally wide.
+// The prefixes of an object's line and of the lines below it, all of the same width.
 struct Branch {
     const char* object;
     const char* below;
@@ -40,7 +40,8 @@ public:
     }
 
 private:
-    // A link that the tree shows below the object: it does not lead back.
+    // Returns whether the tree shows the link below the object: links towards the root are left
+    // out.
     bool isShown(Index object, const Link& link) const
     {
         return link.target != object && distances_[link.target] >= distances_[object];
@@ -55,7 +56,7 @@ private:
         return shown;
     }
 
-    // As deep as the farthest object, whatever circles there are: each step leads away.
+    // The recursion ends despite cycles, since each step increases the distance from the root.
     void writeBelow(Index object, const std::string& indent)
     {
         isDescended_[object] = true;
@@ -85,7 +86,7 @@ private:
         return isLast ? asciiLastBranch : asciiBranch;
     }
 
-    // The remark gives way first when the line is too long.
+    // Shortens the remark first when the line is too long.
     void writeLine(const std::string& before, const std::string& object, const std::string& remark)
     {
         const std::string text = before + printable(object);

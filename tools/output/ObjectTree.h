@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The objects around one object as a tree.
+// The objects associated with one object, as a tree.
 
 #pragma once
 
@@ -14,13 +14,13 @@ namespace Tools {
 struct TreeStyle {
     std::size_t width;
     bool isColored;
-    bool isUtf8; // tree lines are drawn; else they are put together from ASCII
+    bool isUtf8; // box-drawing characters may be used
 };
 
-// The root with its class, and below each object those that are one association further from
-// the root, with the role and the class of the association, a line each. What lies below an
-// object is shown where the object comes first; after that the object is only named. The
-// association between two objects that are equally far is named at both.
+// Writes a line for the root with its class, and below each object a line for each object that is
+// one association further from the root, with the role and the class of the association. The
+// subtree of an object is written at its first occurrence only. An association between two objects
+// at the same distance is written at both.
 void writeTree(Output& out, const AssociationGraph& graph, AssociationGraph::Index root,
     const TreeStyle& style);
 

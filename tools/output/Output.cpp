@@ -25,7 +25,8 @@ void reserveStandardStreams()
     for (const int stream : {STDIN_FILENO, STDOUT_FILENO, STDERR_FILENO}) {
         if (::fcntl(stream, F_GETFD) != -1)
             continue;
-        // The lowest free number is given out, which is this one. Opened the wrong way round.
+        // open() returns the lowest free number, which is this one. The access mode is the wrong
+        // one, so that using the stream fails.
         (void)::open("/dev/null", stream == STDIN_FILENO ? O_WRONLY : O_RDONLY);
     }
 }
@@ -63,7 +64,7 @@ void complain(std::string_view text) noexcept
     try {
         writeAll(STDERR_FILENO, "sensorctl: " + printable(text) + "\n");
     } catch (const std::exception&) {
-        // there is nowhere left to say so
+        // There is nowhere left to report it.
     }
 }
 

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Standard output and standard error, with every failure noticed.
+// Standard output and standard error, with every failure reported.
 
 #pragma once
 
@@ -9,22 +9,22 @@
 
 namespace Tools {
 
-// Fills the places of standard streams that the caller left closed, so that no file opened
-// later is taken for one of them. Reading and writing there fails, as it does on a closed one.
+// Opens descriptors 0 to 2 where the caller left them closed, so that no file opened later gets
+// one of these numbers. Reading and writing there fails, as on a closed one.
 void reserveStandardStreams();
 
-// All of it, whatever the number of calls it takes. Throws std::system_error.
+// Writes the whole text. Throws std::system_error.
 void writeAll(int descriptor, std::string_view text);
 
-// Collects what goes to a descriptor and writes it in large pieces.
+// Buffers what is written to a descriptor.
 class Output {
 public:
     explicit Output(int descriptor) : descriptor_(descriptor) {}
     Output(const Output&) = delete;
     Output& operator=(const Output&) = delete;
 
-    // Throw std::runtime_error with the reason when the text cannot be written. What was not
-    // flushed is not written.
+    // Both throw std::runtime_error with the reason when the text cannot be written. The
+    // destructor does not flush.
     void write(std::string_view text);
     void flush();
 
@@ -33,8 +33,8 @@ private:
     std::string pending_;
 };
 
-// Writes `sensorctl: <text>` as one line to standard error, unprintable characters escaped.
-// That nobody listens there is no failure.
+// Writes `sensorctl: <text>` as one line to standard error, with unprintable characters escaped.
+// Ignores failures.
 void complain(std::string_view text) noexcept;
 
 } // namespace Tools

@@ -28,7 +28,7 @@ std::string withUnit(const std::string& number, std::string_view unit)
     return unit.empty() ? number : number + " " + std::string(unit);
 }
 
-// What a plain number stands for; empty when it stands for itself.
+// Returns the meaning of a number; an empty text when it has none.
 std::string meaningIn(const SensorView& sensor, std::string_view property, const Host::Value& value)
 {
     if (property == "CurrentReading") {
@@ -54,7 +54,7 @@ std::string shown(const SensorView& sensor, std::string_view property, const Hos
     return meaning.empty() ? number : number + " (" + meaning + ")";
 }
 
-// One item, or an item for each element of an array.
+// Returns one item, or an item for each element of an array.
 std::vector<std::string> itemsOf(
     const SensorView& sensor, std::string_view property, const Host::Value& value)
 {
@@ -67,8 +67,8 @@ std::vector<std::string> itemsOf(
     return items;
 }
 
-// Items with commas between them, in lines that begin at the column and stay within the width
-// as far as the items themselves do.
+// Joins the items with commas in lines that begin at the column. Breaks lines between items to keep
+// them within the width.
 std::string flow(const std::vector<std::string>& items, std::size_t column, std::size_t width)
 {
     std::string text;

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// One object in full.
+// All properties of one object.
 
 #pragma once
 
@@ -13,9 +13,8 @@ class Instance;
 
 namespace Tools {
 
-// The object's name, then a line for each property in the order of the instance, with the
-// meanings of codes and scaled numbers beside them. Values that are wider than the width go on
-// in the next line.
+// Returns the object's name, then a line for each property in the order of the instance, with the
+// meanings of codes and scaled numbers. The elements of an array are wrapped at the width.
 std::string propertyList(const Host::Instance& instance, std::size_t width, bool isColored);
 
 } // namespace Tools

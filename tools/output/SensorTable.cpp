@@ -19,7 +19,8 @@ constexpr LimitProperties lowerLimits = {
 constexpr LimitProperties upperLimits = {
     "UpperThresholdNonCritical", "UpperThresholdCritical", "UpperThresholdFatal"};
 
-// From the mildest on, such as "80/95" or "-/95"; nothing stands after the last one there is.
+// Returns the limits by increasing severity, such as "80/95" or "-/95", up to the last one that the
+// sensor has.
 std::string limitsOf(const SensorView& sensor, const LimitProperties& properties)
 {
     std::string text;

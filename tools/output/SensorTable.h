@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Many sensors, a line each.
+// A table of sensors.
 
 #pragma once
 
@@ -14,7 +14,8 @@ class Instance;
 
 namespace Tools {
 
-// Name, reading with its unit, state, health and limits of each sensor, in the given order.
+// Returns a table with name, reading, unit, state, health and limits of each sensor, in the given
+// order.
 std::string sensorTable(
     const std::vector<const Host::Instance*>& sensors, std::size_t width, bool isColored);
 

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Rows of cells in columns as wide as their widest cell, for people at a terminal.
+// A table whose columns are as wide as their widest cell.
 
 #pragma once
 
@@ -13,7 +13,7 @@
 
 namespace Tools {
 
-// What stands where there is nothing to show.
+// Stands for a missing value.
 inline constexpr const char* absent = "-";
 
 struct Cell {
@@ -26,7 +26,7 @@ struct Column {
 
     std::string title;
     Alignment alignment = Alignment::left;
-    std::size_t gap = 2; // blanks before it
+    std::size_t gap = 2; // number of blanks before the column
 };
 
 class Table {
@@ -36,9 +36,8 @@ public:
     // REQUIRES: as many cells as there are columns.
     void add(std::vector<Cell> cells) { rows_.push_back(std::move(cells)); }
 
-    // Title line and rows, each ended by a line feed and without blanks at its end. Where the
-    // lines would be wider than the width, the first column gives way, down to a few
-    // characters; the other columns are never cut.
+    // Returns a line of titles and the rows, each with a line feed and without trailing blanks.
+    // Shortens the first column, down to a few characters, to keep lines within the width.
     std::string toText(std::size_t width, bool isColored) const;
 
 private:

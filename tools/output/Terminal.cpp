@@ -18,14 +18,14 @@ namespace {
 
 constexpr std::size_t usualWidth = 80;
 
-// Empty when it is not set.
+// Returns an empty text for a variable that is not set.
 std::string_view setting(const char* variable)
 {
     const char* const value = std::getenv(variable);
     return value == nullptr ? std::string_view{} : value;
 }
 
-// 0 when the variable holds no such number.
+// Returns 0 when the variable is no number.
 std::size_t wantedWidth()
 {
     const std::string_view text = setting("COLUMNS");
@@ -50,7 +50,7 @@ std::size_t outputWidth()
 
 bool isUtf8Locale()
 {
-    // In the order of precedence.
+    // The variables are in their order of precedence (POSIX).
     for (const char* const variable : {"LC_ALL", "LC_CTYPE", "LANG"}) {
         std::string locale(setting(variable));
         if (locale.empty())

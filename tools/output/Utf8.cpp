@@ -13,7 +13,7 @@ namespace {
 
 constexpr std::string_view ellipsis = "\xE2\x80\xA6"; // one column wide
 
-// The escape of an unprintable character.
+// Returns the escape of an unprintable character.
 std::string escapeOf(char32_t character)
 {
     switch (character) {
