@@ -228,12 +228,12 @@ void Daemon::start(const Certificate* certificate)
     const auto number = [](std::size_t value) { return static_cast<std::intptr_t>(value); };
     const Limits& limits = service_.limits;
     std::vector<MHD_OptionItem> options{
-        // First, since it is used from then on.
+        // First, since the library logs from then on.
         {MHD_OPTION_EXTERNAL_LOGGER, reinterpret_cast<std::intptr_t>(&logLine), nullptr},
         {MHD_OPTION_LISTEN_SOCKET, socket_.descriptor(), nullptr},
         {MHD_OPTION_CONNECTION_MEMORY_LIMIT, number(limits.maximumHeader + memoryBesideHead),
             nullptr},
-        // One more than there may be, so that one too many is told.
+        // One more than the limit, so that Connections can report the one that exceeds it.
         {MHD_OPTION_CONNECTION_LIMIT, number(limits.maximumConnections + 1), nullptr},
         {MHD_OPTION_THREAD_STACK_SIZE, number(stackSize), nullptr},
         {MHD_OPTION_CONNECTION_TIMEOUT, static_cast<std::intptr_t>(limits.idleTimeout.count()),

@@ -20,12 +20,14 @@ namespace Host::Http {
 
 namespace {
 
+// RFC 7617, 2 and 2.1.
 HttpError unauthorized()
 {
     return {MHD_HTTP_UNAUTHORIZED, "sign in with a name and a password", {},
         {{"WWW-Authenticate", R"(Basic realm="sensor-profile", charset="UTF-8")"}}};
 }
 
+// RFC 9110, 15.6.4.
 HttpError unavailable(const std::string& reason)
 {
     return {MHD_HTTP_SERVICE_UNAVAILABLE, reason, {}, {{"Retry-After", "1"}}};
