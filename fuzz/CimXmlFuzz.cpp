@@ -26,12 +26,22 @@ const Host::Repository& classes()
 {
     static const auto compiled = [] {
         Host::Compiler compiler;
-        compiler.compileText("Qualifier Key : boolean = false, Scope(property, reference);"
-                             "Qualifier Association : boolean = false, Scope(association);"
-                             "class A { [Key] string S; [Key] uint16 N; sint8 L[]; datetime D;"
-                             " boolean B; real32 R; char16 C; };"
-                             "class One { [Key] string Id; };"
-                             "[Association] class Link { [Key] A ref Owner; [Key] One ref Part; };",
+        compiler.compileText(R"(
+Qualifier Key : boolean = false, Scope(property, reference), Flavor(DisableOverride);
+Qualifier Association : boolean = false, Scope(association), Flavor(DisableOverride);
+class A {
+    [Key] string S;
+    [Key] uint16 N;
+    sint8 L[];
+    datetime D;
+    boolean B;
+    real32 R;
+    char16 C;
+};
+class One { [Key] string Id; };
+[Association]
+class Link { [Key] A ref Owner; [Key] One ref Part; };
+)",
             "self.mof", "root/test");
         return std::move(compiler).finish();
     }();
