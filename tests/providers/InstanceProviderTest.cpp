@@ -98,10 +98,10 @@ TEST_P(InstanceProviderTest, ARequestWithoutAPathIsRefused)
 
 TEST_P(InstanceProviderTest, AnUnknownKeyIsAnOpenEmptyAnswer)
 {
-    std::string otherCase = GetParam().value;
-    otherCase.back() = 'X';
+    std::string similar = GetParam().value;
+    similar.back() = 'X';
     for (const std::string& unknown :
-        {otherCase, GetParam().value + std::string(" "), std::string(), std::string("other")})
+        {similar, GetParam().value + std::string(" "), std::string(), std::string("other")})
         expectOk(get({{GetParam().key, unknown}}));
     expectNothing(false);
     EXPECT_TRUE(messages_.empty());
