@@ -22,11 +22,6 @@ void returnAssociation(ResultKind kind, const CMPIResult* rslt, const CMPIObject
     CMReturnObjectPath(rslt, path);
 }
 
-bool isOf(const CMPIData& element, CMPIType type)
-{
-    return element.type == type && (element.state & (CMPI_nullValue | CMPI_notFound)) == 0;
-}
-
 } // namespace
 
 void AssociationRequest::failWithoutTarget(
@@ -72,13 +67,13 @@ CMPIInstance* newAssociation(const CMPIBroker* broker, const CMPIObjectPath* pat
 
 CMPIObjectPath* pathOf(const CMPIData& element)
 {
-    return isOf(element, CMPI_ref) && isUsable(element.value.ref) ? element.value.ref : nullptr;
+    return element.type == CMPI_ref && isUsable(element.value.ref) ? element.value.ref : nullptr;
 }
 
 CMPIInstance* instanceOf(const CMPIData& element)
 {
-    return isOf(element, CMPI_instance) && isUsable(element.value.inst) ? element.value.inst
-                                                                        : nullptr;
+    return element.type == CMPI_instance && isUsable(element.value.inst) ? element.value.inst
+                                                                         : nullptr;
 }
 
 } // namespace Vorn::SensorProfileProvider

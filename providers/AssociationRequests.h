@@ -202,6 +202,7 @@ bool forEachElement(const CMPIEnumeration* elements, CMPIStatus* status, const V
 }
 
 // Return the path or the instance of an element, or null when it is of another type or not usable.
+// The state of an element is ignored, since brokers differ in it.
 CMPIObjectPath* pathOf(const CMPIData& element);
 CMPIInstance* instanceOf(const CMPIData& element);
 
