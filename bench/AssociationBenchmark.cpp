@@ -14,6 +14,7 @@
 
 #include <string>
 #include <string_view>
+#include <vector>
 
 namespace {
 
@@ -34,30 +35,29 @@ public:
     Host::Enumeration& enumerateInstanceNames(
         const Host::Context&, const Host::ObjectPath& path) override
     {
-        return fill(
-            CMPI_ref, path, [](const Host::ObjectPath& name) { return Host::Value::of(name); });
+        return fill(path, [](const Host::ObjectPath& name) { return Host::Value::of(name); });
     }
 
     Host::Enumeration& enumerateInstances(
         const Host::Context&, const Host::ObjectPath& path, const char**) override
     {
-        return fill(CMPI_instance, path, [](const Host::ObjectPath& name) {
+        return fill(path, [](const Host::ObjectPath& name) {
             return Host::Value::of(Host::Instance::make(Host::Arena::required(), name, nullptr));
         });
     }
 
 private:
     template <typename Element>
-    Host::Enumeration& fill(CMPIType type, const Host::ObjectPath& path, const Element& element)
+    Host::Enumeration& fill(const Host::ObjectPath& path, const Element& element)
     {
         Host::Arena& arena = Host::Arena::required();
-        Host::Enumeration& elements = Host::Enumeration::make(arena, type);
+        std::vector<Host::Value> elements;
         for (std::int64_t i = 0; i < count_; ++i) {
             Host::ObjectPath& name = path.copiedTo(arena);
             name.addKey("Name", Host::Value::text(arena, "system" + std::to_string(i)));
-            elements.add(element(name));
+            elements.push_back(element(name));
         }
-        return elements;
+        return Host::Enumeration::make(arena, elements);
     }
 
     std::int64_t count_;

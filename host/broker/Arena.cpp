@@ -11,19 +11,9 @@ namespace Host {
 
 namespace {
 
-// A clone is mostly one small object; a request makes many.
-constexpr std::size_t requestBlock = 16 * 1024;
-constexpr std::size_t cloneBlock = 512;
-
 thread_local Arena* currentArena = nullptr;
 
 } // namespace
-
-Arena::Arena(Purpose purpose)
-    : purpose_(purpose), memory_(purpose == Purpose::clone ? cloneBlock : requestBlock, &blocks_),
-      names_(&memory_)
-{
-}
 
 std::string_view Arena::text(std::string_view characters)
 {

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// What the host knows about classes and the broker makes use of.
+// What the broker and the manager need to know about classes.
 
 #pragma once
 
@@ -16,13 +16,12 @@ struct ReferenceProperty {
     std::string className;
 };
 
-// Asked from any thread at any time, without locks: what it says does not change while the
-// broker uses it.
+// Asked from any thread at any time, without locks: its answers never change.
 class ClassInformation {
 public:
     virtual ~ClassInformation() = default;
 
-    // The names of the class's key properties; null when the class is not known. The list
+    // Returns the names of the class's key properties; null when the class is not known. The list
     // lives as long as this object.
     virtual const std::vector<std::string>* keysOf(
         std::string_view nameSpace, std::string_view className) const = 0;
@@ -31,37 +30,10 @@ public:
     virtual bool isDerivedFrom(std::string_view nameSpace, std::string_view className,
         std::string_view ancestor) const = 0;
 
-    // The reference properties of an association class, inherited ones included. None for any
-    // other class, for one that is not known, and for all where nothing is known of associations.
+    // Returns the reference properties of an association class, inherited ones included; none for
+    // any other class and for one that is not known.
     virtual std::vector<ReferenceProperty> referencesOf(
-        std::string_view nameSpace, std::string_view className) const;
-};
-
-// A table of classes, the same in every namespace.
-class ClassTable : public ClassInformation {
-public:
-    // REQUIRES: no broker uses the table yet.
-    void add(std::string className, std::vector<std::string> keys, std::string superclass = {},
-        std::vector<ReferenceProperty> references = {});
-
-    const std::vector<std::string>* keysOf(
-        std::string_view nameSpace, std::string_view className) const override;
-    bool isDerivedFrom(std::string_view nameSpace, std::string_view className,
-        std::string_view ancestor) const override;
-    std::vector<ReferenceProperty> referencesOf(
-        std::string_view nameSpace, std::string_view className) const override;
-
-private:
-    struct Class {
-        std::string name;
-        std::vector<std::string> keys;
-        std::string superclass;
-        std::vector<ReferenceProperty> references;
-    };
-
-    const Class* find(std::string_view className) const;
-
-    std::vector<Class> classes_;
+        std::string_view nameSpace, std::string_view className) const = 0;
 };
 
 } // namespace Host

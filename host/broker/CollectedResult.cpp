@@ -2,54 +2,23 @@
 
 #include "host/broker/CollectedResult.h"
 
-#include "host/broker/Enumeration.h"
-#include "host/broker/Error.h"
 #include "host/broker/Instance.h"
 #include "host/broker/ObjectPath.h"
 
 namespace Host {
 
-namespace {
-
-template <typename Objects>
-Enumeration& enumerationOf(const Objects& objects, CMPIType type)
+void CollectedResult::append(const CollectedResult& other)
 {
-    Enumeration& enumeration = Enumeration::make(Arena::required(), type);
-    for (const auto* const object : objects)
-        enumeration.add(Value::of(*object));
-    return enumeration;
+    instances_.insert(instances_.end(), other.instances_.begin(), other.instances_.end());
+    paths_.insert(paths_.end(), other.paths_.begin(), other.paths_.end());
+    refused_ += other.refused_;
 }
 
-} // namespace
-
-void CollectedResult::instance(const Instance& instance)
+void CollectedResult::keepOnly(const std::function<bool(std::string_view)>& isWanted)
 {
-    instances_.push_back(&instance.copiedTo(Arena::required()));
-}
-
-void CollectedResult::path(const ObjectPath& path)
-{
-    paths_.push_back(&path.copiedTo(Arena::required()));
-}
-
-void CollectedResult::data(const Value& value)
-{
-    values_.push_back(value.copiedTo(Arena::required()));
-}
-
-void CollectedResult::error(const Error& error)
-{
-    errors_.push_back(&error.copiedTo(Arena::required()));
-}
-
-Enumeration& CollectedResult::pathEnumeration() const
-{
-    return enumerationOf(paths_, CMPI_ref);
-}
-
-Enumeration& CollectedResult::instanceEnumeration() const
-{
-    return enumerationOf(instances_, CMPI_instance);
+    const auto isUnwanted = [&](const auto* object) { return !isWanted(object->className()); };
+    std::erase_if(instances_, isUnwanted);
+    std::erase_if(paths_, isUnwanted);
 }
 
 } // namespace Host

@@ -1,48 +1,43 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// A sink that keeps the answer in order.
+// What a provider delivered in answer to a call, in order.
 
 #pragma once
 
-#include "host/broker/ResultSink.h"
-#include "host/broker/Value.h"
-
 #include <cstddef>
+#include <functional>
+#include <string_view>
 #include <vector>
 
 namespace Host {
 
-class Enumeration;
+class Instance;
+class ObjectPath;
 
-// What it holds shows each object as it was when it was delivered, and lives as long as the
-// request.
-class CollectedResult : public ResultSink {
+// Shows each object as it was when it was delivered. The objects live as long as the request.
+class CollectedResult {
 public:
-    void instance(const Instance& instance) override;
-    void path(const ObjectPath& path) override;
-    void data(const Value& value) override;
-    void error(const Error& error) override;
-    void done() override { isDone_ = true; }
-    void refused(CMPIrc) override { ++refused_; }
-
     const std::vector<const Instance*>& instances() const noexcept { return instances_; }
     const std::vector<const ObjectPath*>& paths() const noexcept { return paths_; }
-    const std::vector<Value>& values() const noexcept { return values_; }
-    const std::vector<const Error*>& errors() const noexcept { return errors_; }
+    // Whether the provider closed its result.
     bool isDone() const noexcept { return isDone_; }
-    // How many deliveries were refused.
+    // How many deliveries were refused: of null, of objects without a handle, and after the end.
     std::size_t refused() const noexcept { return refused_; }
 
-    // The answer of an up-call: the paths, or the instances. In the arena of this thread's
-    // request, which must be the one they live in.
-    Enumeration& pathEnumeration() const;
-    Enumeration& instanceEnumeration() const;
+    bool isEmpty() const noexcept { return instances_.empty() && paths_.empty(); }
+
+    void add(const Instance& instance) { instances_.push_back(&instance); }
+    void add(const ObjectPath& path) { paths_.push_back(&path); }
+    void addRefusal() noexcept { ++refused_; }
+    void close() noexcept { isDone_ = true; }
+    // Adds the objects and refusals of the other one.
+    void append(const CollectedResult& other);
+    // Removes the objects of which the predicate does not want the class.
+    void keepOnly(const std::function<bool(std::string_view className)>& isWanted);
 
 private:
     std::vector<const Instance*> instances_;
     std::vector<const ObjectPath*> paths_;
-    std::vector<Value> values_;
-    std::vector<const Error*> errors_;
     bool isDone_ = false;
     std::size_t refused_ = 0;
 };

@@ -2,61 +2,35 @@
 
 #include "host/broker/Enumeration.h"
 
-#include "host/broker/Array.h"
 #include "host/broker/Slot.h"
+
+#include <algorithm>
 
 namespace Host {
 
-Enumeration& Enumeration::make(Arena& arena, CMPIType type)
+Enumeration& Enumeration::make(Arena& arena, std::span<const Value> elements)
 {
-    return arena.make<Enumeration>(arena, type);
-}
-
-void Enumeration::add(const Value& value)
-{
-    elements_.append(memory(), value);
-}
-
-Enumeration& Enumeration::copiedTo(Arena& arena) const
-{
-    Enumeration& copy = make(arena, type_);
-    for (const Value& element : elements_)
-        copy.elements_.append(arena, element.copiedTo(arena));
-    while (copy.position_ < position_)
-        copy.advance();
-    return copy;
-}
-
-const Value& Enumeration::advance()
-{
-    if (position_++ == 0)
-        next_ = elements_.begin();
-    return *next_++;
+    Value* const copy = arena.makeArray<Value>(elements.size());
+    std::copy(elements.begin(), elements.end(), copy);
+    return arena.make<Enumeration>(std::span<const Value>(copy, elements.size()));
 }
 
 CMPIData Enumeration::getNext()
 {
-    if (!hasNext())
+    if (rest_.empty())
         throw Refusal(CMPI_RC_NO_MORE_ELEMENTS, "the enumeration is at its end");
-    return advance().data(); // made for the caller alone
-}
-
-Array& Enumeration::toArray() const
-{
-    Array& array = Array::make(memory(), type_, static_cast<CMPICount>(elements_.size()));
-    CMPICount position = 0;
-    for (const Value& element : elements_)
-        array.set(position++, element);
-    return array;
+    const Value next = rest_.front();
+    rest_ = rest_.subspan(1);
+    return next.data(); // made for the caller alone
 }
 
 const CMPIEnumerationFT Enumeration::functions = {
     .ftVersion = CMPIVersion200,
-    .release = slot<&Enumeration::release>,
-    .clone = slot<&Enumeration::cloned>,
+    .release = notOffered,
+    .clone = notOffered,
     .getNext = slot<&Enumeration::getNext>,
     .hasNext = slot<&Enumeration::hasNext>,
-    .toArray = slot<&Enumeration::toArray>,
+    .toArray = notOffered,
 };
 
 } // namespace Host

@@ -23,7 +23,7 @@ bool contains(NameList names, std::string_view name)
         [name](const String* known) { return equalNames(*known->text(), name); });
 }
 
-// A list of texts that ends with a null; null itself is an empty list.
+// Copies a list of texts that ends with a null; null itself is an empty list.
 NameList copied(Arena& arena, const char** names)
 {
     std::size_t count = 0;
@@ -35,14 +35,6 @@ NameList copied(Arena& arena, const char** names)
     return {copy, count};
 }
 
-NameList copied(Arena& arena, NameList names)
-{
-    const String** const copy = arena.makeArray<const String*>(names.size());
-    std::transform(names.begin(), names.end(), copy,
-        [&arena](const String* name) { return &arena.name(*name->text()); });
-    return {copy, names.size()};
-}
-
 void addKeyIfSet(ObjectPath& path, std::string_view name, const Value& value)
 {
     if (!value.isNull() && !isArrayType(value.type()) && value.type() != CMPI_instance)
@@ -51,14 +43,9 @@ void addKeyIfSet(ObjectPath& path, std::string_view name, const Value& value)
 
 } // namespace
 
-Instance::Instance(Arena& home, const ObjectPath& path, const ClassInformation* classes)
-    : Encapsulated(&home), path_(&path), classes_(classes)
-{
-}
-
 Instance& Instance::make(Arena& arena, const ObjectPath& path, const ClassInformation* classes)
 {
-    return arena.make<Instance>(arena, path.copiedTo(arena), classes);
+    return arena.make<Instance>(path.copiedTo(arena), classes);
 }
 
 std::string_view Instance::className() const noexcept
@@ -75,7 +62,7 @@ const Value* Instance::property(std::string_view name) const noexcept
 void Instance::setProperty(std::string_view name, const Value& value)
 {
     if (isWanted(name))
-        properties_.set(memory(), name, value);
+        properties_.set(Arena::required(), name, value);
 }
 
 ObjectPath& Instance::objectPath() const
@@ -104,12 +91,11 @@ ObjectPath& Instance::objectPath() const
 
 Instance& Instance::copiedTo(Arena& arena) const
 {
-    const bool livesThere = home_ == &arena;
     Instance& copy = make(arena, *path_, classes_);
-    copy.properties_ = properties_.copiedTo(arena, livesThere);
+    copy.properties_ = properties_.shared();
     copy.isFiltered_ = isFiltered_;
-    copy.wanted_ = livesThere ? wanted_ : copied(arena, wanted_);
-    copy.keyNames_ = livesThere ? keyNames_ : copied(arena, keyNames_);
+    copy.wanted_ = wanted_;
+    copy.keyNames_ = keyNames_;
     return copy;
 }
 
@@ -130,7 +116,7 @@ bool Instance::isWanted(std::string_view name) const
 
 void Instance::setPropertyFilter(const char** properties, const char** keys)
 {
-    Arena& arena = memory();
+    Arena& arena = Arena::required();
     isFiltered_ = properties != nullptr;
     wanted_ = copied(arena, properties);
     keyNames_ = copied(arena, keys);
@@ -143,42 +129,21 @@ void Instance::setProviderProperty(const char* name, const CMPIValue* value, CMP
 {
     const std::string_view wanted = requiredText(name, "the property's name");
     if (isWanted(wanted))
-        properties_.set(memory(), wanted, Value::from(memory(), value, type));
-}
-
-void Instance::setPropertyWithOrigin(
-    const char* name, const CMPIValue* value, CMPIType type, const char*)
-{
-    setProviderProperty(name, value, type); // class origins are the class's to tell
-}
-
-CMPIData Instance::getProperty(const char* name) const
-{
-    return properties_.get(name, CMPI_RC_ERR_NO_SUCH_PROPERTY);
-}
-
-CMPIData Instance::getPropertyAt(CMPICount position, CMPIString** name) const
-{
-    return properties_.getAt(position, name);
-}
-
-void Instance::setObjectPath(const CMPIObjectPath* path)
-{
-    path_ = &required<ObjectPath>(path).copiedTo(memory());
+        properties_.set(Arena::required(), wanted, Value::from(Arena::required(), value, type));
 }
 
 const CMPIInstanceFT Instance::functions = {
     .ftVersion = CMPIVersion200,
-    .release = slot<&Instance::release>,
-    .clone = slot<&Instance::cloned>,
-    .getProperty = slot<&Instance::getProperty>,
-    .getPropertyAt = slot<&Instance::getPropertyAt>,
-    .getPropertyCount = slot<+[](const Instance& instance) { return instance.properties_.size(); }>,
+    .release = notOffered,
+    .clone = notOffered,
+    .getProperty = notOffered,
+    .getPropertyAt = notOffered,
+    .getPropertyCount = notOffered,
     .setProperty = slot<&Instance::setProviderProperty>,
     .getObjectPath = slot<&Instance::objectPath>,
     .setPropertyFilter = slot<&Instance::setPropertyFilter>,
-    .setObjectPath = slot<&Instance::setObjectPath>,
-    .setPropertyWithOrigin = slot<&Instance::setPropertyWithOrigin>,
+    .setObjectPath = notOffered,
+    .setPropertyWithOrigin = notOffered,
 };
 
 } // namespace Host

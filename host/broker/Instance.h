@@ -1,7 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// An instance behind a CMPIInstance: a path and properties, with the filter its provider
-// put on them.
+// An instance behind a CMPIInstance: a path and properties, with the filter that its provider set.
 
 #pragma once
 
@@ -18,7 +17,7 @@ class ObjectPath;
 
 class Instance : public Encapsulated<Instance, CMPIInstance, Object::Kind::instance> {
 public:
-    // An instance without properties at the path, which is copied. The class information
+    // Makes an instance without properties at the path, which is copied. The class information
     // may be null; it must outlive the instance.
     static Instance& make(Arena& arena, const ObjectPath& path, const ClassInformation* classes);
 
@@ -27,16 +26,18 @@ public:
     // Null when there is no such property.
     const Value* property(std::string_view name) const noexcept;
 
-    // A property that the filter leaves out is passed over. The value must live as long as
-    // the instance's request.
+    // Sets the property unless the filter leaves it out. The value must live as long as the
+    // instance.
     void setProperty(std::string_view name, const Value& value);
 
-    // A new path of this thread's request: the one the instance was made with, with the values its
-    // key properties have now. Keys are those of the class where it is known, in the order of the
-    // properties, else those the provider named in its filter; one without a value is left out.
+    // Returns a new path in this thread's arena: the one that the instance was made with, and the
+    // values that its key properties have now. Keys are those of the class where it is known, in
+    // the order of the properties, else those named in the filter; one without a value is left
+    // out.
     ObjectPath& objectPath() const;
 
-    // A new instance, equal to this one.
+    // Returns a new instance, equal to this one. The two share their properties until one of them
+    // changes: this one must live as long as the copy.
     Instance& copiedTo(Arena& arena) const;
 
     static const CMPIInstanceFT functions;
@@ -45,17 +46,15 @@ private:
     friend class Arena;
     using Names = std::span<const String* const>;
 
-    Instance(Arena& home, const ObjectPath& path, const ClassInformation* classes);
+    Instance(const ObjectPath& path, const ClassInformation* classes)
+        : path_(&path), classes_(classes)
+    {
+    }
 
     bool isKey(std::string_view name) const;
     bool isWanted(std::string_view name) const;
     void setPropertyFilter(const char** properties, const char** keys);
     void setProviderProperty(const char* name, const CMPIValue* value, CMPIType type);
-    void setPropertyWithOrigin(
-        const char* name, const CMPIValue* value, CMPIType type, const char* origin);
-    CMPIData getProperty(const char* name) const;
-    CMPIData getPropertyAt(CMPICount position, CMPIString** name) const;
-    void setObjectPath(const CMPIObjectPath* path);
 
     const ObjectPath* path_;
     const ClassInformation* classes_;

@@ -26,16 +26,11 @@ void NamedValues::set(Arena& arena, std::string_view name, const Value& value)
         elements_.append(arena, {&arena.name(name), value});
 }
 
-NamedValues NamedValues::copiedTo(Arena& arena, bool livesThere) const
+NamedValues NamedValues::shared() const
 {
     NamedValues copy;
-    if (livesThere) {
-        copy.elements_ = elements_;
-        copy.isShared_ = isShared_ = true;
-    } else {
-        for (const auto& [name, value] : elements_)
-            copy.elements_.append(arena, {&arena.name(*name->text()), value.copiedTo(arena)});
-    }
+    copy.elements_ = elements_;
+    copy.isShared_ = isShared_ = true;
     return copy;
 }
 

@@ -1,7 +1,7 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
 // Values found by name, in the order in which they were first set: the keys of a path, the
-// properties of an instance, the arguments of a method, the entries of a context.
+// properties of an instance, the entries of a context.
 
 #pragma once
 
@@ -20,8 +20,7 @@ struct NamedValue {
     Value value;
 };
 
-// Takes memory for each change from the arena it is handed. A copy within one arena shares
-// its elements with the original until one of the two changes.
+// Takes memory for each change from the arena that it is given.
 class NamedValues {
 public:
     NamedValues() noexcept = default;
@@ -51,10 +50,11 @@ public:
         isShared_ = false;
     }
 
-    // The elements for an object in the arena; shared when the original lives there too.
-    NamedValues copiedTo(Arena& arena, bool livesThere) const;
+    // Returns a copy that shares the elements until one of the two changes. The original must live
+    // as long as the copy.
+    NamedValues shared() const;
 
-    // What the get functions of CMPI answer. Throw Refusal with the code when there is no
+    // Return what the get functions of CMPI do. Throw Refusal with the code when there is no
     // such name, and with CMPI_RC_ERR_NO_SUCH_PROPERTY when the position is out of range.
     CMPIData get(const char* name, CMPIrc whenAbsent) const;
     CMPIData getAt(CMPICount position, CMPIString** name) const; // name may be null

@@ -9,8 +9,13 @@ namespace Host {
 namespace {
 
 constexpr std::array typeNames = {"CMPIBroker", "CMPIString", "CMPIArray", "CMPIObjectPath",
-    "CMPIInstance", "CMPIEnumeration", "CMPIDateTime", "CMPIArgs", "CMPIContext", "CMPIResult",
-    "CMPIError"};
+    "CMPIInstance", "CMPIEnumeration", "CMPIDateTime", "CMPIContext", "CMPIResult"};
+
+// The layout that every encapsulated object begins with, whatever its function table.
+struct AnyHandle {
+    const void* hdl;
+    const void* ft;
+};
 
 std::uint32_t indexOf(Object::Kind kind) noexcept
 {

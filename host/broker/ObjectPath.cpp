@@ -18,16 +18,9 @@ const String& nameOrNone(Arena& arena, const char* text)
 
 } // namespace
 
-ObjectPath::ObjectPath(
-    Arena& home, const String& nameSpace, const String& host, const String& className)
-    : Encapsulated(&home), nameSpace_(&nameSpace), host_(&host), className_(&className)
-{
-}
-
 ObjectPath& ObjectPath::make(Arena& arena, std::string_view nameSpace, std::string_view className)
 {
-    return arena.make<ObjectPath>(
-        arena, arena.name(nameSpace), arena.name({}), arena.name(className));
+    return arena.make<ObjectPath>(arena.name(nameSpace), arena.name({}), arena.name(className));
 }
 
 std::string_view ObjectPath::nameSpace() const noexcept
@@ -53,17 +46,17 @@ const Value* ObjectPath::key(std::string_view name) const noexcept
 
 void ObjectPath::setNameSpace(const char* nameSpace)
 {
-    nameSpace_ = &nameOrNone(memory(), nameSpace);
+    nameSpace_ = &nameOrNone(Arena::required(), nameSpace);
 }
 
 void ObjectPath::setHost(const char* host)
 {
-    host_ = &nameOrNone(memory(), host);
+    host_ = &nameOrNone(Arena::required(), host);
 }
 
 void ObjectPath::setClassName(const char* className)
 {
-    className_ = &memory().name(requiredText(className, "the class name"));
+    className_ = &Arena::required().name(requiredText(className, "the class name"));
 }
 
 void ObjectPath::addKey(std::string_view name, const Value& value)
@@ -71,7 +64,7 @@ void ObjectPath::addKey(std::string_view name, const Value& value)
     if (isArrayType(value.type()) || value.type() == CMPI_instance)
         throw Refusal(CMPI_RC_ERR_INVALID_DATA_TYPE,
             "key " + std::string(name) + " cannot be of CMPI type " + std::to_string(value.type()));
-    keys_.set(memory(), name, value.asKey());
+    keys_.set(Arena::required(), name, value.asKey());
 }
 
 std::string ObjectPath::toText() const
@@ -81,19 +74,14 @@ std::string ObjectPath::toText() const
 
 ObjectPath& ObjectPath::copiedTo(Arena& arena) const
 {
-    const bool livesThere = home_ == &arena;
-    const auto copied = [&](const String& name) -> const String& {
-        return livesThere ? name : nameOrNone(arena, name.characters());
-    };
-    ObjectPath& copy =
-        arena.make<ObjectPath>(arena, copied(*nameSpace_), copied(*host_), copied(*className_));
-    copy.keys_ = keys_.copiedTo(arena, livesThere);
+    ObjectPath& copy = arena.make<ObjectPath>(*nameSpace_, *host_, *className_);
+    copy.keys_ = keys_.shared();
     return copy;
 }
 
 void ObjectPath::addProviderKey(const char* name, const CMPIValue* value, CMPIType type)
 {
-    addKey(requiredText(name, "the key's name"), Value::from(memory(), value, type));
+    addKey(requiredText(name, "the key's name"), Value::from(Arena::required(), value, type));
 }
 
 CMPIData ObjectPath::getKey(const char* name) const
@@ -106,21 +94,10 @@ CMPIData ObjectPath::getKeyAt(CMPICount position, CMPIString** name) const
     return keys_.getAt(position, name);
 }
 
-void ObjectPath::setNameSpaceFrom(const CMPIObjectPath* other)
-{
-    setNameSpace(required<ObjectPath>(other).nameSpace_->characters());
-}
-
-void ObjectPath::setHostAndNameSpaceFrom(const CMPIObjectPath* other)
-{
-    setNameSpaceFrom(other);
-    setHost(required<ObjectPath>(other).host_->characters());
-}
-
 const CMPIObjectPathFT ObjectPath::functions = {
     .ftVersion = CMPIVersion200,
-    .release = slot<&ObjectPath::release>,
-    .clone = slot<&ObjectPath::cloned>,
+    .release = notOffered,
+    .clone = notOffered,
     .setNameSpace = slot<&ObjectPath::setNameSpace>,
     .getNameSpace = slot<+[](const ObjectPath& path) { return path.nameSpace_->handle(); }>,
     .setHostname = slot<&ObjectPath::setHost>,
@@ -131,15 +108,13 @@ const CMPIObjectPathFT ObjectPath::functions = {
     .getKey = slot<&ObjectPath::getKey>,
     .getKeyAt = slot<&ObjectPath::getKeyAt>,
     .getKeyCount = slot<+[](const ObjectPath& path) { return path.keys_.size(); }>,
-    .setNameSpaceFromObjectPath = slot<&ObjectPath::setNameSpaceFrom>,
-    .setHostAndNameSpaceFromObjectPath = slot<&ObjectPath::setHostAndNameSpaceFrom>,
+    .setNameSpaceFromObjectPath = notOffered,
+    .setHostAndNameSpaceFromObjectPath = notOffered,
     .getClassQualifier = notOffered,
     .getPropertyQualifier = notOffered,
     .getMethodQualifier = notOffered,
     .getParameterQualifier = notOffered,
-    .toString = slot<+[](const ObjectPath& path) -> const String& {
-        return String::make(Arena::required(), path.toText());
-    }>,
+    .toString = notOffered,
 };
 
 } // namespace Host

@@ -25,35 +25,38 @@ public:
     // Null when there is no such key.
     const Value* key(std::string_view name) const noexcept;
 
-    // A null text takes the namespace or host away: what a provider then gets is a string
-    // object without characters.
+    // A null text removes the namespace or host: providers then get a string object without
+    // characters.
     void setNameSpace(const char* nameSpace);
     void setHost(const char* host);
     // Throws Refusal (CMPI_RC_ERR_INVALID_PARAMETER) for null.
     void setClassName(const char* className);
 
-    // Replaces a key of the same name. The value must live as long as the path's request.
-    // Throws Refusal (CMPI_RC_ERR_INVALID_DATA_TYPE) for an array or an instance.
+    // Replaces a key of the same name. The value must live as long as the path. Throws Refusal
+    // (CMPI_RC_ERR_INVALID_DATA_TYPE) for an array or an instance.
     void addKey(std::string_view name, const Value& value);
 
-    // As a URI without scheme: //host/namespace:Class.Key="value",Other=1. Texts are quoted,
-    // with a backslash before quotes and backslashes; a reference is its own URI, quoted.
+    // Returns the untyped URI of DSP0207 without its scheme:
+    // //host/namespace:Class.Key="value",N=1. Texts are quoted, with a backslash before quotes and
+    // backslashes; a reference is its own URI, quoted.
     std::string toText() const;
 
-    // A new path, equal to this one.
+    // Returns a new path, equal to this one. The two share their keys until one of them changes:
+    // this one must live as long as the copy.
     ObjectPath& copiedTo(Arena& arena) const;
 
     static const CMPIObjectPathFT functions;
 
 private:
     friend class Arena;
-    ObjectPath(Arena& home, const String& nameSpace, const String& host, const String& className);
+    ObjectPath(const String& nameSpace, const String& host, const String& className)
+        : nameSpace_(&nameSpace), host_(&host), className_(&className)
+    {
+    }
 
     void addProviderKey(const char* name, const CMPIValue* value, CMPIType type);
     CMPIData getKey(const char* name) const;
     CMPIData getKeyAt(CMPICount position, CMPIString** name) const;
-    void setNameSpaceFrom(const CMPIObjectPath* other);
-    void setHostAndNameSpaceFrom(const CMPIObjectPath* other);
 
     const String* nameSpace_;
     const String* host_;

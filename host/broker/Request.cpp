@@ -20,16 +20,14 @@ void addText(Context& context, Arena& arena, const char* name, std::string_view 
 
 Request::Request(const Broker& broker, const RequestInfo& info)
     : broker_(broker), own_(Arena::current() == nullptr ? std::make_shared<Arena>() : nullptr),
-      arena_(own_ ? *own_ : *Arena::current()), context_(arena_)
+      arena_(own_ ? *own_ : *Arena::current())
 {
     Arena* const before = Arena::makeCurrent(&arena_);
     try {
         context_.add(CMPIInvocationFlags, Value::integer(CMPI_uint32, info.flags));
         addText(context_, arena_, CMPIInitNameSpace, info.nameSpace);
         addText(context_, arena_, CMPIPrincipal, info.principal);
-        addText(context_, arena_, CMPIRole, info.role);
         addText(context_, arena_, CMPIAcceptLanguage, info.acceptLanguage);
-        addText(context_, arena_, CMPIContentLanguage, info.contentLanguage);
     } catch (...) {
         Arena::makeCurrent(before);
         throw;

@@ -23,9 +23,7 @@ struct RequestInfo {
     CMPIFlags flags = 0; // CMPI_FLAG_LocalOnly and so on
     std::string_view nameSpace{};
     std::string_view principal{};
-    std::string_view role{};
     std::string_view acceptLanguage{};
-    std::string_view contentLanguage{};
 };
 
 // All objects made while it lasts go with it, unless somebody holds on to its arena. A request

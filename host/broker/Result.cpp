@@ -2,67 +2,51 @@
 
 #include "host/broker/Result.h"
 
-#include "host/broker/Error.h"
 #include "host/broker/Instance.h"
 #include "host/broker/ObjectPath.h"
-#include "host/broker/ResultSink.h"
 #include "host/broker/Slot.h"
-#include "host/broker/Value.h"
 
 namespace Host {
 
-// Every delivery goes through here: in turn, not after the end, and refusals are told.
+// Runs a delivery unless the result is closed, and counts those that are refused.
 template <typename Delivery>
-void Result::deliver(Delivery delivery)
+void Result::deliver(const Delivery& delivery)
 {
-    const std::lock_guard lock(mutex_);
     try {
-        if (isDone_)
+        if (collected_.isDone())
             throw Refusal(CMPI_RC_ERR_FAILED, "the result is closed");
         delivery();
-    } catch (const Refusal& refusal) {
-        sink_.refused(refusal.code());
+    } catch (const Refusal&) {
+        collected_.addRefusal();
         throw;
     }
 }
 
-void Result::returnData(const CMPIValue* value, CMPIType type)
-{
-    deliver([&] { sink_.data(Value::from(Arena::required(), value, type)); });
-}
-
+// Providers may change an object after they delivered it, hence the copies.
 void Result::returnInstance(const CMPIInstance* instance)
 {
-    deliver([&] { sink_.instance(required<Instance>(instance)); });
+    deliver([&] { collected_.add(required<Instance>(instance).copiedTo(Arena::required())); });
 }
 
 void Result::returnObjectPath(const CMPIObjectPath* path)
 {
-    deliver([&] { sink_.path(required<ObjectPath>(path)); });
+    deliver([&] { collected_.add(required<ObjectPath>(path).copiedTo(Arena::required())); });
 }
 
 void Result::returnDone()
 {
-    deliver([&] {
-        sink_.done();
-        isDone_ = true;
-    });
-}
-
-void Result::returnError(const CMPIError* error)
-{
-    deliver([&] { sink_.error(required<Error>(error)); });
+    deliver([&] { collected_.close(); });
 }
 
 const CMPIResultFT Result::functions = {
     .ftVersion = CMPIVersion200,
-    .release = slot<&Result::release>,
-    .clone = notOffered, // there is one answer
-    .returnData = slot<&Result::returnData>,
+    .release = notOffered,
+    .clone = notOffered,
+    .returnData = notOffered,
     .returnInstance = slot<&Result::returnInstance>,
     .returnObjectPath = slot<&Result::returnObjectPath>,
     .returnDone = slot<&Result::returnDone>,
-    .returnError = slot<&Result::returnError>,
+    .returnError = notOffered,
 };
 
 } // namespace Host

@@ -75,16 +75,27 @@ constexpr bool endsInStatus()
             std::tuple_element_t<sizeof...(Arguments) - 1, std::tuple<Arguments...>>, CMPIStatus*>;
 }
 
-// The trailing status pointer of a slot's arguments; null when there is none.
-template <typename... Arguments>
-CMPIStatus* statusOf(const std::tuple<Arguments...>& arguments)
+inline CMPIStatus* statusIn(CMPIStatus* status)
 {
-    if constexpr (endsInStatus<Arguments...>())
-        return std::get<sizeof...(Arguments) - 1>(arguments);
-    else
-        return nullptr;
+    return status;
+}
+template <typename Other>
+CMPIStatus* statusIn(const Other&)
+{
+    return nullptr;
 }
 
+// Returns the status pointer among a slot's arguments; null when there is none.
+template <typename... Arguments>
+CMPIStatus* statusOf(const Arguments&... arguments)
+{
+    CMPIStatus* found = nullptr;
+    ((found = found == nullptr ? statusIn(arguments) : found), ...);
+    return found;
+}
+
+// Sets the status and returns what the slot returns with it. The functions that return an int
+// return a code; only void functions have no way to fail.
 template <typename Answer>
 Answer refuse(CMPIStatus* status, CMPIrc code, const char* reason)
 {
@@ -93,13 +104,17 @@ Answer refuse(CMPIStatus* status, CMPIrc code, const char* reason)
         *status = outcome;
     if constexpr (std::is_same_v<Answer, CMPIStatus>)
         return outcome;
+    else if constexpr (std::is_same_v<Answer, int>)
+        return code;
     else
         return nothing<Answer>();
 }
 
-// A pointer to a slot's function; deduces a slot's signature from the table it is put into.
+// Pointers to a slot's function; they deduce its signature from the table that it is put into.
 template <typename Answer, typename... Arguments>
 using Pointer = Answer (*)(Arguments...);
+template <typename Answer, typename... Arguments>
+using VariadicPointer = Answer (*)(Arguments..., ...);
 
 } // namespace Detail
 
@@ -129,7 +144,7 @@ public:
         constexpr std::size_t count =
             sizeof...(Arguments) - (Detail::endsInStatus<Arguments...>() ? 1 : 0);
         const std::tuple<Arguments...> all{arguments...};
-        CMPIStatus* const status = Detail::statusOf(all);
+        CMPIStatus* const status = Detail::statusOf(arguments...);
         // Only standard exceptions: a cancelled thread unwinds with another kind.
         try {
             Self* const self = Self::of(handle);
@@ -155,13 +170,18 @@ public:
 template <auto function>
 inline constexpr Slot<function> slot{};
 
-// For slots that the broker does not offer: they answer CMPI_RC_ERR_NOT_SUPPORTED.
+// Fills slots of services that the broker does not offer: they answer CMPI_RC_ERR_NOT_SUPPORTED.
 class NotOffered {
     template <typename Answer, typename... Arguments>
     static Answer call(Arguments... arguments)
     {
-        return Detail::refuse<Answer>(Detail::statusOf(std::tuple<Arguments...>{arguments...}),
-            CMPI_RC_ERR_NOT_SUPPORTED, "not offered by this broker");
+        return Detail::refuse<Answer>(Detail::statusOf(arguments...), CMPI_RC_ERR_NOT_SUPPORTED,
+            "not offered by this broker");
+    }
+    template <typename Answer, typename... Arguments>
+    static Answer callVariadic(Arguments... arguments, ...)
+    {
+        return call<Answer>(arguments...);
     }
 
 public:
@@ -169,6 +189,11 @@ public:
     constexpr operator Detail::Pointer<Answer, Arguments...>() const noexcept
     {
         return &call<Answer, Arguments...>;
+    }
+    template <typename Answer, typename... Arguments>
+    constexpr operator Detail::VariadicPointer<Answer, Arguments...>() const noexcept
+    {
+        return &callVariadic<Answer, Arguments...>;
     }
 };
 

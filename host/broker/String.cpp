@@ -8,25 +8,18 @@ namespace Host {
 
 String& String::make(Arena& arena, std::string_view text)
 {
-    return arena.make<String>(arena, arena.text(text));
+    return arena.make<String>(arena.text(text));
 }
 
 String& String::makeWithoutText(Arena& arena)
 {
-    return arena.make<String>(arena, std::string_view{});
-}
-
-String& String::copiedTo(Arena& arena) const
-{
-    if (home_ == &arena)
-        return const_cast<String&>(*this);
-    return text_.data() == nullptr ? makeWithoutText(arena) : make(arena, text_);
+    return arena.make<String>(std::string_view{});
 }
 
 const CMPIStringFT String::functions = {
     .ftVersion = CMPIVersion200,
-    .release = slot<&String::release>,
-    .clone = slot<&String::cloned>,
+    .release = notOffered,
+    .clone = notOffered,
     .getCharPtr = slot<&String::characters>,
 };
 

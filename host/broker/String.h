@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// A text behind a CMPIString. Immutable, hence shared freely within its arena.
+// A text behind a CMPIString. It is immutable, hence shared freely.
 
 #pragma once
 
@@ -14,7 +14,7 @@ namespace Host {
 class String : public Encapsulated<String, CMPIString, Object::Kind::string> {
 public:
     static String& make(Arena& arena, std::string_view text);
-    // A string object whose character pointer is null, as some object managers hand out for
+    // Makes a string object whose character pointer is null, as some object managers return for
     // the host of a path.
     static String& makeWithoutText(Arena& arena);
 
@@ -26,14 +26,11 @@ public:
     // Zero-terminated, or null.
     const char* characters() const noexcept { return text_.data(); }
 
-    // Itself when it lives there already.
-    String& copiedTo(Arena& arena) const;
-
     static const CMPIStringFT functions;
 
 private:
     friend class Arena;
-    String(Arena& home, std::string_view text) : Encapsulated(&home), text_(text) {}
+    explicit String(std::string_view text) : text_(text) {}
 
     std::string_view text_;
 };

@@ -8,13 +8,13 @@
 
 namespace Host {
 
-// Up-calls and threads. Each broker has a copy with its own name and capabilities.
+// Information about the broker, and up-calls.
 extern const CMPIBrokerFT upcallFunctions;
-// Making objects, messages, logging and tracing.
+// Object construction and trace messages.
 extern const CMPIBrokerEncFT encapsulationFunctions;
-// Threads, mutexes and conditions of the operating system.
+// Threads, mutexes, conditions and memory blocks, none of which the broker offers. CMPI lets a
+// broker leave the table of memory blocks out; a full table costs a provider no test.
 extern const CMPIBrokerExtFT operatingSystemFunctions;
-// Memory that lasts as long as a request.
 extern const CMPIBrokerMemFT memoryFunctions;
 
 } // namespace Host

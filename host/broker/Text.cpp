@@ -96,22 +96,4 @@ std::string toText(const Instance& instance)
     return result += " };";
 }
 
-std::string toText(const Object& object)
-{
-    switch (object.kind()) {
-    case Object::Kind::string:
-        return std::string(static_cast<const String&>(object).text().value_or(""));
-    case Object::Kind::array:
-        return toText(static_cast<const Array&>(object));
-    case Object::Kind::objectPath:
-        return toText(static_cast<const ObjectPath&>(object));
-    case Object::Kind::instance:
-        return toText(static_cast<const Instance&>(object));
-    case Object::Kind::dateTime:
-        return static_cast<const DateTime&>(object).toText();
-    default:
-        return Object::typeName(object.kind());
-    }
-}
-
 } // namespace Host

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Objects and values as people read them.
+// Objects and values as text for people.
 
 #pragma once
 
@@ -10,18 +10,15 @@ namespace Host {
 
 class Array;
 class Instance;
-class Object;
 class ObjectPath;
 class Value;
 
-// A path as ObjectPath::toText describes it.
+// As ObjectPath::toText describes it.
 std::string toText(const ObjectPath& path);
 // Texts quoted, references quoted, a null as NULL, an array as {1, 2}.
 std::string toText(const Value& value);
 std::string toText(const Array& array);
 // As MOF writes it: instance of Class { Name = value; };
 std::string toText(const Instance& instance);
-// Any of the objects above, a plain string or a date-time; of another kind its type's name.
-std::string toText(const Object& object);
 
 } // namespace Host

@@ -9,9 +9,7 @@
 #include "host/broker/String.h"
 #include "host/broker/Types.h"
 
-#include <algorithm>
 #include <cstring>
-#include <type_traits>
 
 namespace Host {
 
@@ -33,24 +31,9 @@ Value::Value(CMPIType type, const void* bits, std::size_t size) noexcept
     std::memcpy(&bits_, bits, size);
 }
 
-Value Value::ofHandle(CMPIType type, const void* handle, unsigned nesting) noexcept
+Value Value::ofHandle(CMPIType type, const void* handle) noexcept
 {
-    Value value{type, &handle, sizeof handle};
-    value.nesting_ = static_cast<std::uint8_t>(std::min(nesting, maximumNesting + 1));
-    return value;
-}
-
-template <typename Values>
-unsigned Value::deepest(const Values& values) noexcept
-{
-    unsigned found = 0;
-    for (const auto& element : values) {
-        if constexpr (std::is_same_v<decltype(element), const NamedValue&>)
-            found = std::max<unsigned>(found, element.value.nesting_);
-        else
-            found = std::max<unsigned>(found, element.nesting_);
-    }
-    return found;
+    return {type, &handle, sizeof handle};
 }
 
 template <typename T>
@@ -83,17 +66,17 @@ Value Value::of(const DateTime& dateTime) noexcept
 
 Value Value::of(const ObjectPath& path) noexcept
 {
-    return ofHandle(CMPI_ref, path.handle(), 1 + deepest(path.keys()));
+    return ofHandle(CMPI_ref, path.handle());
 }
 
 Value Value::of(const Instance& instance) noexcept
 {
-    return ofHandle(CMPI_instance, instance.handle(), 1 + deepest(instance.properties()));
+    return ofHandle(CMPI_instance, instance.handle());
 }
 
 Value Value::of(const Array& array) noexcept
 {
-    return ofHandle(arrayOf(array.type()), array.handle(), deepest(array.elements()));
+    return ofHandle(arrayOf(array.type()), array.handle());
 }
 
 Value Value::boolean(bool value) noexcept
@@ -240,11 +223,7 @@ const Array* Value::array() const noexcept
 Value Value::copiedTo(Arena& arena) const
 {
     Value copy = *this;
-    if (const String* const text = string())
-        copy = of(text->copiedTo(arena));
-    else if (const DateTime* const time = dateTime())
-        copy = of(time->copiedTo(arena));
-    else if (const ObjectPath* const reference = path())
+    if (const ObjectPath* const reference = path())
         copy = of(reference->copiedTo(arena));
     else if (const Instance* const embedded = instance())
         copy = of(embedded->copiedTo(arena));
@@ -256,8 +235,7 @@ Value Value::copiedTo(Arena& arena) const
 
 CMPIData Value::handOut() const
 {
-    const bool isChangeable = path() != nullptr || instance() != nullptr || array() != nullptr;
-    return isChangeable ? copiedTo(Arena::required()).data() : data();
+    return copiedTo(Arena::required()).data();
 }
 
 CMPIData Value::data() const noexcept

@@ -23,19 +23,18 @@ class String;
 // to the arena it was made in and is never changed through the value.
 class Value {
 public:
-    // How deep paths and instances may stand in one another. Quoting a path doubles the
+    // How deep paths may stand in one another in what clients send: each level doubles the
     // backslashes of what stands in it.
     static constexpr unsigned maximumNesting = 8;
 
     // A null value without a type.
     constexpr Value() noexcept = default;
 
-    // A copy of what a provider hands over by address; of CMPI_chars, the text that the
+    // Copies the value at an address that a provider passed; of CMPI_chars, the text that the
     // address itself is. A null address, text or object is a null value; CMPI_chars becomes
     // CMPI_string. Throws Refusal: CMPI_RC_ERR_INVALID_DATA_TYPE for a type that a value
     // cannot have, CMPI_RC_ERR_TYPE_MISMATCH for an array of another type,
-    // CMPI_RC_ERR_INVALID_HANDLE for a handle without an object,
-    // CMPI_RC_ERR_SERVER_LIMITS_EXCEEDED beyond the maximum nesting.
+    // CMPI_RC_ERR_INVALID_HANDLE for a handle without an object.
     static Value from(Arena& arena, const void* value, CMPIType type);
 
     static Value text(Arena& arena, std::string_view text);
@@ -51,14 +50,14 @@ public:
     // Of any type that is no object and no text; reads no more bytes than the type has.
     static Value plain(const void* value, CMPIType type) noexcept;
     static Value null(CMPIType type) noexcept;
-    // What some object managers put where a client left out a key.
+    // What some object managers pass for a key that a client left out.
     static Value absent() noexcept;
 
     CMPIType type() const noexcept { return type_; }
     CMPIValueState state() const noexcept { return state_; }
     bool isNull() const noexcept { return (state_ & CMPI_nullValue) != 0; }
 
-    // Each answers nothing when the value is null or of another type.
+    // Each returns nothing when the value is null or of another type.
     std::optional<std::string_view> text() const noexcept;
     std::optional<bool> boolean() const noexcept;
     std::optional<std::uint64_t> unsignedInteger() const noexcept; // also CMPI_char16
@@ -70,11 +69,11 @@ public:
     const Instance* instance() const noexcept;
     const Array* array() const noexcept;
 
-    // The value with all it refers to, living in the arena.
+    // Returns the value with copies of the path, instance or array that it refers to.
     Value copiedTo(Arena& arena) const;
 
-    // What a provider gets to see; it may change the objects in it without changing the
-    // value. Throws Refusal when no request is active and there is an object to copy.
+    // Returns what a provider gets, which may change the objects in it without changing the
+    // value. Throws Refusal when no request is active.
     CMPIData handOut() const;
     // The same objects, not copies of them.
     CMPIData data() const noexcept;
@@ -84,9 +83,7 @@ public:
 
 private:
     Value(CMPIType type, const void* bits, std::size_t size) noexcept;
-    static Value ofHandle(CMPIType type, const void* handle, unsigned nesting = 0) noexcept;
-    template <typename Values>
-    static unsigned deepest(const Values& values) noexcept;
+    static Value ofHandle(CMPIType type, const void* handle) noexcept;
     template <typename T>
     T get() const noexcept;
     template <typename Self>
@@ -94,8 +91,7 @@ private:
 
     CMPIType type_ = CMPI_null;
     CMPIValueState state_ = CMPI_nullValue;
-    std::uint8_t nesting_ = 0; // paths and instances down from here
-    std::uint64_t bits_ = 0;   // the first bytes of a CMPIValue
+    std::uint64_t bits_ = 0; // the first bytes of a CMPIValue
 };
 
 } // namespace Host

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Values as providers hand them over: an address and a type that says what stands there.
+// Values as providers pass them: an address and a type that says what stands there.
 
 #include "host/broker/Array.h"
 #include "host/broker/DateTime.h"
@@ -26,13 +26,13 @@ Pointer pointerAt(const void* address) noexcept
     return pointer;
 }
 
-// A copy of the object whose handle stands at the address; null when there is no handle.
+// Returns a copy of the object whose handle stands at the address; null when there is no handle.
 template <typename Self>
 Value copyOfObject(Arena& arena, const void* address, CMPIType type)
 {
     const auto* const handle = pointerAt<const typename Self::Handle*>(address);
     return handle == nullptr ? Value::null(type)
-                             : Value::of(required<Self>(handle).copiedTo(arena));
+                             : Value::of(required<Self>(handle)).copiedTo(arena);
 }
 
 Value copyOfArray(Arena& arena, const void* address, CMPIType type)
@@ -43,7 +43,7 @@ Value copyOfArray(Arena& arena, const void* address, CMPIType type)
     const Array& array = required<Array>(handle);
     if (arrayOf(array.type()) != type)
         throw Refusal(CMPI_RC_ERR_TYPE_MISMATCH, "the array's elements are of another type");
-    return Value::of(array.copiedTo(arena));
+    return Value::of(array).copiedTo(arena);
 }
 
 Value copyOfText(Arena& arena, const char* text)
@@ -84,11 +84,7 @@ Value Value::from(Arena& arena, const void* value, CMPIType type)
             "a value cannot be of CMPI type " + std::to_string(type));
     if (value == nullptr)
         return null(keptType(type));
-    const Value copy = copyOf(arena, value, type);
-    if (copy.nesting_ > maximumNesting)
-        throw Refusal(CMPI_RC_ERR_SERVER_LIMITS_EXCEEDED,
-            "paths or instances nested deeper than " + std::to_string(maximumNesting));
-    return copy;
+    return copyOf(arena, value, type);
 }
 
 } // namespace Host

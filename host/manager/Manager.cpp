@@ -2,34 +2,82 @@
 
 #include "host/manager/Manager.h"
 
-#include "host/broker/CollectedResult.h"
+#include "host/broker/Enumeration.h"
 #include "host/broker/Instance.h"
-#include "host/manager/Answers.h"
-#include "host/manager/ManagerUpcalls.h"
 #include "host/manager/ProviderCall.h"
+#include "platform/logging/RynLogger.h"
 
-#include <exception>
-#include <string>
+#include <optional>
 #include <utility>
 
 namespace Host {
 
 namespace {
 
-// What cannot be loaded is no reason to end: it is an answer like others.
-template <typename Load>
-auto& loaded(const Load& load)
+constexpr int warningLevel = 7000;
+
+template <typename Objects>
+Enumeration& enumerationOf(const Objects& objects)
 {
-    try {
-        return load();
-    } catch (const std::exception& error) {
-        throw Refusal(CMPI_RC_ERR_FAILED, error.what());
-    }
+    std::vector<Value> elements;
+    for (const auto* const object : objects)
+        elements.push_back(Value::of(*object));
+    return Enumeration::make(Arena::required(), elements);
 }
+
+class Upcalls : public BrokerUpcalls {
+public:
+    explicit Upcalls(const Manager& manager) : manager_(manager) {}
+
+    Enumeration& enumerateInstanceNames(const Context& context, const ObjectPath& path) override
+    {
+        return enumerationOf(manager_.enumerateInstanceNames(context, path).paths());
+    }
+    Enumeration& enumerateInstances(
+        const Context& context, const ObjectPath& path, const char** properties) override
+    {
+        return enumerationOf(manager_.enumerateInstances(context, path, properties).instances());
+    }
+
+private:
+    const Manager& manager_;
+};
 
 [[noreturn]] void refuseMissing(const ObjectPath& path)
 {
     throw Refusal(CMPI_RC_ERR_NOT_FOUND, "there is no " + path.toText());
+}
+
+// Writes a failure to the log, unless the provider merely does not support the operation.
+void report(const ProviderRegistration& provider, const Refusal& refusal)
+{
+    if (refusal.code() == CMPI_RC_ERR_NOT_SUPPORTED)
+        return;
+    RynLog::RynLogger::logLevelMessage("askEach", "Manager", __LINE__, "Manager", warningLevel,
+        nullptr, 0, 0,
+        provider.providerName + " answers code " + std::to_string(refusal.code()) + ": " +
+            refusal.what());
+}
+
+// Asks the providers in turn and returns what all of them have found.
+template <typename Ask>
+CollectedResult askEach(const Routing::Registrations& providers, const Ask& ask)
+{
+    CollectedResult found;
+    std::optional<Refusal> firstFailure;
+    for (const ProviderRegistration* const provider : providers) {
+        try {
+            found.append(ask(*provider));
+        } catch (const Refusal& refusal) {
+            if (providers.size() > 1)
+                report(*provider, refusal);
+            if (!firstFailure)
+                firstFailure = refusal;
+        }
+    }
+    if (firstFailure && found.isEmpty())
+        throw Refusal(*firstFailure);
+    return found;
 }
 
 // The objects that references finds are of the association class itself.
@@ -41,178 +89,123 @@ Manager::Association ofReferences(const Manager::Association& association)
 } // namespace
 
 Manager::Manager(const ClassInformation& classes, std::vector<ProviderRegistration> registrations)
-    : Manager(classes, std::move(registrations),
-          [](const Broker& broker) { return std::make_unique<LoadedProviders>(broker); })
-{
-}
-
-Manager::Manager(const ClassInformation& classes, std::vector<ProviderRegistration> registrations,
-    const SourceMaker& makeSource)
-    : routing_(classes, std::move(registrations)), upcalls_(std::make_unique<ManagerUpcalls>(*this))
+    : routing_(classes, load(std::move(registrations))), upcalls_(std::make_unique<Upcalls>(*this))
 {
     broker_.setClassInformation(&classes);
     broker_.setUpcalls(upcalls_.get());
-    source_ = makeSource(broker_);
 }
 
 Manager::~Manager()
 {
-    broker_.setUpcalls(nullptr); // a cleanup that calls up finds nobody
+    broker_.setUpcalls(nullptr); // up-calls of a cleanup fail
 }
 
-void Manager::preload()
+std::vector<ProviderRegistration> Manager::load(std::vector<ProviderRegistration> registrations)
 {
-    for (const ProviderRegistration& registration : routing_.registrations()) {
-        if (registration.servesInstances)
-            instanceMI(registration);
-        if (registration.servesAssociations)
-            associationMI(registration);
+    for (ProviderRegistration& each : registrations) {
+        if (each.libraryFile.empty())
+            continue;
+        ProviderLibrary& library =
+            libraries_.try_emplace(each.libraryFile, broker_, each.libraryFile).first->second;
+        each.instanceMI = &library.createInstanceMI(each.providerName);
+        if (each.servesAssociations)
+            each.associationMI = &library.createAssociationMI(each.providerName);
     }
+    return registrations;
 }
 
-CMPIInstanceMI& Manager::instanceMI(const ProviderRegistration& registration)
+CollectedResult Manager::enumerateInstanceNames(
+    const Context& context, const ObjectPath& path) const
 {
-    return loaded([&]() -> CMPIInstanceMI& { return source_->instanceMI(registration); });
+    return askEach(routing_.providersBelow(path), [&](const ProviderRegistration& provider) {
+        CMPIInstanceMI& mi = *provider.instanceMI;
+        return callProvider(provider, "enumerating instance names", mi,
+            mi.ft->enumerateInstanceNames, context, targetOf(path, provider.className));
+    });
 }
 
-CMPIAssociationMI& Manager::associationMI(const ProviderRegistration& registration)
+CollectedResult Manager::enumerateInstances(
+    const Context& context, const ObjectPath& path, const char** properties) const
 {
-    return loaded([&]() -> CMPIAssociationMI& { return source_->associationMI(registration); });
-}
-
-void Manager::enumerateInstanceNames(
-    const Context& context, const ObjectPath& path, ResultSink& sink)
-{
-    gatherAnswers(routing_.providersBelow(path), sink,
-        [&](const ProviderRegistration& provider, ResultSink& answer) {
-            CMPIInstanceMI& mi = instanceMI(provider);
-            callProvider(provider, "enumerating instance names", mi, mi.ft->enumerateInstanceNames,
-                context, answer, targetOf(path, provider.className));
-        });
-}
-
-void Manager::enumerateInstances(
-    const Context& context, const ObjectPath& path, const char** properties, ResultSink& sink)
-{
-    gatherAnswers(routing_.providersBelow(path), sink,
-        [&](const ProviderRegistration& provider, ResultSink& answer) {
-            CMPIInstanceMI& mi = instanceMI(provider);
-            callProvider(provider, "enumerating instances", mi, mi.ft->enumerateInstances, context,
-                answer, targetOf(path, provider.className), properties);
-        });
+    return askEach(routing_.providersBelow(path), [&](const ProviderRegistration& provider) {
+        CMPIInstanceMI& mi = *provider.instanceMI;
+        return callProvider(provider, "enumerating instances", mi, mi.ft->enumerateInstances,
+            context, targetOf(path, provider.className), properties);
+    });
 }
 
 const Instance& Manager::getInstance(
-    const Context& context, const ObjectPath& path, const char** properties)
+    const Context& context, const ObjectPath& path, const char** properties) const
 {
-    // Where nobody serves the class there are no objects of it.
-    const ProviderRegistration* const served = routing_.findProviderOf(path);
-    if (served == nullptr)
+    const ProviderRegistration* const provider = routing_.findProviderOf(path);
+    if (provider == nullptr)
         refuseMissing(path);
-    const ProviderRegistration& provider = *served;
-    CMPIInstanceMI& mi = instanceMI(provider);
-    CollectedResult answer;
-    callProvider(provider, "getting instances", mi, mi.ft->getInstance, context, answer,
-        targetOf(path, provider.className), properties);
-    if (answer.instances().empty())
+    CMPIInstanceMI& mi = *provider->instanceMI;
+    const CollectedResult found = callProvider(*provider, "getting instances", mi,
+        mi.ft->getInstance, context, targetOf(path, provider->className), properties);
+    if (found.instances().empty())
         refuseMissing(path);
-    return *answer.instances().front();
+    return *found.instances().front();
 }
 
-const ObjectPath& Manager::createInstance(
-    const Context& context, const ObjectPath& path, const Instance& instance)
+// Asks for what an association leads to, and drops what is not of the result class.
+template <typename Ask>
+CollectedResult Manager::askAssociations(const ObjectPath& source, const Association& association,
+    const char* resultClass, const Ask& ask) const
 {
-    const ProviderRegistration& provider = routing_.providerOf(path);
-    CMPIInstanceMI& mi = instanceMI(provider);
-    CollectedResult answer;
-    callProvider(provider, "creating instances", mi, mi.ft->createInstance, context, answer,
-        targetOf(path, provider.className), instance.handle());
-    if (answer.paths().empty())
-        throw Refusal(CMPI_RC_ERR_FAILED, provider.providerName + " does not say what it made");
-    return *answer.paths().front();
+    const auto providers = routing_.associationProviders(source, association);
+    return askEach(providers, [&](const ProviderRegistration& provider) {
+        CollectedResult found =
+            ask(provider, *provider.associationMI, targetOf(source, routing_.classNameOf(source)));
+        if (resultClass != nullptr)
+            found.keepOnly([&](std::string_view className) {
+                return routing_.isA(source.nameSpace(), className, resultClass);
+            });
+        return found;
+    });
 }
 
-void Manager::modifyInstance(const Context& context, const ObjectPath& path,
-    const Instance& instance, const char** properties)
+CollectedResult Manager::associators(const Context& context, const ObjectPath& source,
+    const Association& association, const char** properties) const
 {
-    const ProviderRegistration& provider = routing_.providerOf(path);
-    CMPIInstanceMI& mi = instanceMI(provider);
-    CollectedResult answer;
-    callProvider(provider, "modifying instances", mi, mi.ft->modifyInstance, context, answer,
-        targetOf(path, provider.className), instance.handle(), properties);
-}
-
-void Manager::deleteInstance(const Context& context, const ObjectPath& path)
-{
-    const ProviderRegistration& provider = routing_.providerOf(path);
-    CMPIInstanceMI& mi = instanceMI(provider);
-    CollectedResult answer;
-    callProvider(provider, "deleting instances", mi, mi.ft->deleteInstance, context, answer,
-        targetOf(path, provider.className));
-}
-
-void Manager::execQuery(const Context& context, const ObjectPath& path, const char* query,
-    const char* language, ResultSink& sink)
-{
-    gatherAnswers({&routing_.providerOf(path)}, sink,
-        [&](const ProviderRegistration& provider, ResultSink& answer) {
-            CMPIInstanceMI& mi = instanceMI(provider);
-            callProvider(provider, "queries", mi, mi.ft->execQuery, context, answer,
-                targetOf(path, provider.className), query, language);
-        });
-}
-
-void Manager::associators(const Context& context, const ObjectPath& source,
-    const Association& association, const char** properties, ResultSink& sink)
-{
-    gatherAnswers(routing_.associationProviders(source, association), sink,
-        [&](const ProviderRegistration& provider, ResultSink& answer) {
-            CMPIAssociationMI& mi = associationMI(provider);
-            AnswerOfClass wanted(answer, routing_, source.nameSpace(), association.resultClass);
-            callProvider(provider, "following associations", mi, mi.ft->associators, context,
-                wanted, targetOf(source, routing_.classNameOf(source)), provider.className.c_str(),
+    return askAssociations(source, association, association.resultClass,
+        [&](const auto& provider, auto& mi, const CMPIObjectPath* target) {
+            return callProvider(provider, "following associations", mi, mi.ft->associators, context,
+                target, provider.className.c_str(),
                 routing_.resultClassFor(provider, source, association), association.role,
                 association.resultRole, properties);
         });
 }
 
-void Manager::associatorNames(const Context& context, const ObjectPath& source,
-    const Association& association, ResultSink& sink)
+CollectedResult Manager::associatorNames(
+    const Context& context, const ObjectPath& source, const Association& association) const
 {
-    gatherAnswers(routing_.associationProviders(source, association), sink,
-        [&](const ProviderRegistration& provider, ResultSink& answer) {
-            CMPIAssociationMI& mi = associationMI(provider);
-            AnswerOfClass wanted(answer, routing_, source.nameSpace(), association.resultClass);
-            callProvider(provider, "following associations", mi, mi.ft->associatorNames, context,
-                wanted, targetOf(source, routing_.classNameOf(source)), provider.className.c_str(),
+    return askAssociations(source, association, association.resultClass,
+        [&](const auto& provider, auto& mi, const CMPIObjectPath* target) {
+            return callProvider(provider, "following associations", mi, mi.ft->associatorNames,
+                context, target, provider.className.c_str(),
                 routing_.resultClassFor(provider, source, association), association.role,
                 association.resultRole);
         });
 }
 
-void Manager::references(const Context& context, const ObjectPath& source,
-    const Association& association, const char** properties, ResultSink& sink)
+CollectedResult Manager::references(const Context& context, const ObjectPath& source,
+    const Association& association, const char** properties) const
 {
-    gatherAnswers(routing_.associationProviders(source, ofReferences(association)), sink,
-        [&](const ProviderRegistration& provider, ResultSink& answer) {
-            CMPIAssociationMI& mi = associationMI(provider);
-            AnswerOfClass wanted(answer, routing_, source.nameSpace(), association.resultClass);
-            callProvider(provider, "finding references", mi, mi.ft->references, context, wanted,
-                targetOf(source, routing_.classNameOf(source)), provider.className.c_str(),
-                association.role, properties);
+    return askAssociations(source, ofReferences(association), association.resultClass,
+        [&](const auto& provider, auto& mi, const CMPIObjectPath* target) {
+            return callProvider(provider, "finding references", mi, mi.ft->references, context,
+                target, provider.className.c_str(), association.role, properties);
         });
 }
 
-void Manager::referenceNames(const Context& context, const ObjectPath& source,
-    const Association& association, ResultSink& sink)
+CollectedResult Manager::referenceNames(
+    const Context& context, const ObjectPath& source, const Association& association) const
 {
-    gatherAnswers(routing_.associationProviders(source, ofReferences(association)), sink,
-        [&](const ProviderRegistration& provider, ResultSink& answer) {
-            CMPIAssociationMI& mi = associationMI(provider);
-            AnswerOfClass wanted(answer, routing_, source.nameSpace(), association.resultClass);
-            callProvider(provider, "finding references", mi, mi.ft->referenceNames, context, wanted,
-                targetOf(source, routing_.classNameOf(source)), provider.className.c_str(),
-                association.role);
+    return askAssociations(source, ofReferences(association), association.resultClass,
+        [&](const auto& provider, auto& mi, const CMPIObjectPath* target) {
+            return callProvider(provider, "finding references", mi, mi.ft->referenceNames, context,
+                target, provider.className.c_str(), association.role);
         });
 }
 

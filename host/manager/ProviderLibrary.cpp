@@ -4,7 +4,6 @@
 
 #include "host/broker/Broker.h"
 #include "host/broker/Request.h"
-#include "host/manager/MakingTurn.h"
 
 #include <dlfcn.h>
 
@@ -15,7 +14,7 @@ namespace Host {
 
 namespace {
 
-// An oldest function table that still has the layout of the headers.
+// The oldest function table that still has the layout of the headers.
 constexpr CMPIVersion oldestVersion = 100;
 
 [[noreturn]] void fail(const std::string& file, const std::string& reason)
@@ -23,13 +22,13 @@ constexpr CMPIVersion oldestVersion = 100;
     throw std::runtime_error(file + ": " + reason);
 }
 
-// Calls the cleanup of each MI, also when one before has refused. False when the library is
-// to stay loaded.
+// Calls the cleanup of each MI, also after one has refused. Returns false when the library is to
+// stay loaded.
 template <typename MIs>
 bool cleanUpAll(const MIs& mis, Context& context)
 {
     bool mayUnload = true;
-    for (const auto& [factory, mi] : mis) {
+    for (auto* const mi : mis) {
         if (mi->ft->cleanup == nullptr)
             continue;
         const CMPIStatus status = mi->ft->cleanup(mi, context.handle(), true);
@@ -59,37 +58,15 @@ ProviderLibrary::~ProviderLibrary()
         (void)library_.release();
 }
 
-CMPIInstanceMI& ProviderLibrary::instanceMI(const std::string& provider)
+CMPIInstanceMI& ProviderLibrary::createInstanceMI(const std::string& provider)
 {
-    return mi(instanceMIs_, provider + "_Create_InstanceMI");
+    return *instanceMIs_.emplace_back(create<CMPIInstanceMI>(provider + "_Create_InstanceMI"));
 }
 
-CMPIAssociationMI& ProviderLibrary::associationMI(const std::string& provider)
+CMPIAssociationMI& ProviderLibrary::createAssociationMI(const std::string& provider)
 {
-    return mi(associationMIs_, provider + "_Create_AssociationMI");
-}
-
-template <typename MI>
-MI* ProviderLibrary::findMade(
-    const std::map<std::string, MI*>& made, const std::string& factory) const
-{
-    const std::lock_guard lock(mutex_);
-    const auto place = made.find(factory);
-    return place == made.end() ? nullptr : place->second;
-}
-
-template <typename MI>
-MI& ProviderLibrary::mi(std::map<std::string, MI*>& made, const std::string& factory)
-{
-    if (MI* const known = findMade(made, factory))
-        return *known;
-    const MakingTurn turn(file_ + ": " + factory);
-    if (MI* const known = findMade(made, factory))
-        return *known;
-    MI* const first = create<MI>(factory);
-    const std::lock_guard lock(mutex_);
-    made.emplace(factory, first);
-    return *first;
+    return *associationMIs_.emplace_back(
+        create<CMPIAssociationMI>(provider + "_Create_AssociationMI"));
 }
 
 template <typename MI>
@@ -120,7 +97,7 @@ bool ProviderLibrary::cleanUp() noexcept
         const bool associationsDone = cleanUpAll(associationMIs_, request.context());
         return instancesDone && associationsDone;
     } catch (const std::exception&) {
-        return false; // whatever did not clean up may still be at work
+        return false; // what did not clean up may still be in use
     }
 }
 

@@ -2,6 +2,8 @@
 
 #pragma once
 
+#include <cmpidt.h>
+
 #include <string>
 
 namespace Host {
@@ -11,10 +13,14 @@ struct ProviderRegistration {
     std::string className;
     // What the names of the provider's factory functions begin with.
     std::string providerName;
-    // With its folder; of no meaning where providers do not come from files.
+    // With its folder; empty for a provider inside the process.
     std::string libraryFile;
-    bool servesInstances = true;
     bool servesAssociations = false;
+
+    // The provider's management interfaces (MIs). The manager sets them for providers that it
+    // loads.
+    CMPIInstanceMI* instanceMI = nullptr;
+    CMPIAssociationMI* associationMI = nullptr;
 };
 
 } // namespace Host

@@ -15,13 +15,7 @@ namespace Host {
 
 namespace {
 
-[[noreturn]] void refuseUnserved(std::string_view className)
-{
-    throw Refusal(
-        CMPI_RC_ERR_NOT_SUPPORTED, "no provider serves the class " + std::string(className));
-}
-
-// Whether the name is the wanted one; any is when none is wanted.
+// Whether the name is the wanted one; null wants any.
 bool matches(std::string_view name, const char* wanted)
 {
     return wanted == nullptr || equalNames(name, wanted);
@@ -39,17 +33,9 @@ const ProviderRegistration* Routing::findProviderOf(const ObjectPath& path) cons
     checkKnown(path.nameSpace(), path.className());
     const auto found = std::find_if(
         registrations_.begin(), registrations_.end(), [&](const ProviderRegistration& candidate) {
-            return candidate.servesInstances && equalNames(candidate.className, path.className());
+            return equalNames(candidate.className, path.className());
         });
     return found == registrations_.end() ? nullptr : &*found;
-}
-
-const ProviderRegistration& Routing::providerOf(const ObjectPath& path) const
-{
-    const ProviderRegistration* const found = findProviderOf(path);
-    if (found == nullptr)
-        refuseUnserved(path.className());
-    return *found;
 }
 
 Routing::Registrations Routing::providersBelow(const ObjectPath& path) const
@@ -57,11 +43,11 @@ Routing::Registrations Routing::providersBelow(const ObjectPath& path) const
     checkKnown(path.nameSpace(), path.className());
     Registrations found;
     for (const ProviderRegistration& candidate : registrations_)
-        if (candidate.servesInstances &&
-            isA(path.nameSpace(), candidate.className, path.className()))
+        if (isA(path.nameSpace(), candidate.className, path.className()))
             found.push_back(&candidate);
     if (found.empty())
-        refuseUnserved(path.className());
+        throw Refusal(CMPI_RC_ERR_NOT_SUPPORTED,
+            "no provider serves the class " + std::string(path.className()));
     return found;
 }
 

@@ -1,10 +1,9 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Which providers an operation goes to.
+// Selects the providers that an operation is dispatched to.
 
 #pragma once
 
-#include "host/broker/BrokerUpcalls.h"
 #include "host/broker/ClassInformation.h"
 #include "host/manager/ProviderRegistration.h"
 
@@ -21,46 +20,46 @@ class ObjectPath;
 class Routing {
 public:
     using Registrations = std::vector<const ProviderRegistration*>;
-    using Association = BrokerUpcalls::Association;
+    // What a client asks of an association (DSP0200, Associators); null for what it left out.
+    struct Association {
+        const char* associationClass = nullptr;
+        const char* resultClass = nullptr;
+        const char* role = nullptr;
+        const char* resultRole = nullptr;
+    };
 
     // The classes must outlive the routing.
     Routing(const ClassInformation& classes, std::vector<ProviderRegistration> registrations);
 
-    const std::vector<ProviderRegistration>& registrations() const noexcept
-    {
-        return registrations_;
-    }
-
-    // Of the path's class itself: an object is of one class.
-    const ProviderRegistration& providerOf(const ObjectPath& path) const;
-    // The same; null where no provider serves the class.
+    // Returns the provider of the path's class itself; null where no provider serves it.
     const ProviderRegistration* findProviderOf(const ObjectPath& path) const;
 
-    // Of the path's class and of all below it, in the order of registration; never empty.
+    // Returns the providers of the path's class and of all below it, in the order of registration;
+    // never empty.
     Registrations providersBelow(const ObjectPath& path) const;
 
-    // Of the association classes that can lead away from the source as the association says:
-    // of its class or below it, referring by the role to the source's class or to one above
-    // it, and by another reference, the result role, to what may be of the result class. May
-    // be empty: where nothing can be found, there is nobody to ask.
+    // Returns the providers of the association classes that can lead away from the source: those
+    // of the named class or below it that refer by the role to the source's class or to one above
+    // it, and by another reference, the result role, to what may be of the result class. May be
+    // empty.
     Registrations associationProviders(
         const ObjectPath& source, const Association& association) const;
 
-    // The result class to hand to a provider that may know no superclasses: null instead of one
+    // Returns the result class for a provider that may know no superclasses: null instead of one
     // above all that the association leads to, since it excludes nothing there.
     const char* resultClassFor(const ProviderRegistration& registration, const ObjectPath& source,
         const Association& association) const;
 
-    // The name of the path's class as it is registered; as it stands when it is not.
+    // Returns the name of the path's class as it is registered; as it stands when it is not.
     std::string classNameOf(const ObjectPath& path) const;
 
-    // Whether it is that class or one below it.
+    // Whether the class is the other one or below it.
     bool isA(
         std::string_view nameSpace, std::string_view className, std::string_view ancestor) const;
 
 private:
     void checkKnown(std::string_view nameSpace, std::string_view className) const;
-    // The references at the other end from the source.
+    // Returns the references to the end opposite the source.
     std::vector<ReferenceProperty> farEnds(const ProviderRegistration& registration,
         const ObjectPath& source, const Association& association) const;
     bool canReach(std::string_view nameSpace, const ReferenceProperty& far,

@@ -8,15 +8,15 @@ std::vector<ProviderRegistration> sensorProfileProviders(
     const std::string& sensorLibrary, const std::optional<std::string>& computerSystemLibrary)
 {
     std::vector<ProviderRegistration> providers = {
-        {"ZUMLO_NumericSensor", "SensorProfileProvider", sensorLibrary, true, false},
+        {"ZUMLO_NumericSensor", "SensorProfileProvider", sensorLibrary},
         {"ZUMLO_SensorEnabledLogicalElementCapabilities",
-            "SensorEnabledLogicalElementCapabilitiesProvider", sensorLibrary, true, false},
+            "SensorEnabledLogicalElementCapabilitiesProvider", sensorLibrary},
         {"ZUMLO_SensorElementCapabilities", "SensorElementCapabilitiesProvider", sensorLibrary,
-            true, true},
-        {"ZUMLO_SensorSystemDevice", "SensorSystemDeviceProvider", sensorLibrary, true, true}};
+            true},
+        {"ZUMLO_SensorSystemDevice", "SensorSystemDeviceProvider", sensorLibrary, true}};
     if (computerSystemLibrary)
-        providers.push_back({"ZUMLO_ComputerSystem", "ComputerSystemProvider",
-            *computerSystemLibrary, true, false});
+        providers.push_back(
+            {"ZUMLO_ComputerSystem", "ComputerSystemProvider", *computerSystemLibrary});
     return providers;
 }
 

@@ -12,7 +12,8 @@
 
 namespace Host {
 
-// Library files with their folders. Without the second one nobody serves ZUMLO_ComputerSystem.
+// Library files with their folders. Without the second one no provider serves
+// ZUMLO_ComputerSystem.
 std::vector<ProviderRegistration> sensorProfileProviders(
     const std::string& sensorLibrary, const std::optional<std::string>& computerSystemLibrary);
 

@@ -47,10 +47,8 @@ void AssociationOperations::associators(
     if (operation.path == nullptr)
         return addDeclarations(found, associatedClasses(classes_, operation));
     PropertyNames properties(operation.selection.properties);
-    addWhole(found, [&](ResultSink& sink) {
-        manager_.associators(
-            request.context(), *operation.path, associationOf(operation), properties.get(), sink);
-    });
+    addWhole(found, manager_.associators(request.context(), *operation.path,
+                        associationOf(operation), properties.get()));
 }
 
 void AssociationOperations::associatorNames(
@@ -58,10 +56,8 @@ void AssociationOperations::associatorNames(
 {
     if (operation.path == nullptr)
         return addNames(found, associatedClasses(classes_, operation));
-    addWhole(found, [&](ResultSink& sink) {
-        manager_.associatorNames(
-            request.context(), *operation.path, associationOf(operation), sink);
-    });
+    addWhole(found,
+        manager_.associatorNames(request.context(), *operation.path, associationOf(operation)));
 }
 
 void AssociationOperations::references(
@@ -70,10 +66,8 @@ void AssociationOperations::references(
     if (operation.path == nullptr)
         return addDeclarations(found, referringClasses(classes_, operation));
     PropertyNames properties(operation.selection.properties);
-    addWhole(found, [&](ResultSink& sink) {
-        manager_.references(
-            request.context(), *operation.path, associationOf(operation), properties.get(), sink);
-    });
+    addWhole(found, manager_.references(request.context(), *operation.path,
+                        associationOf(operation), properties.get()));
 }
 
 void AssociationOperations::referenceNames(
@@ -81,9 +75,8 @@ void AssociationOperations::referenceNames(
 {
     if (operation.path == nullptr)
         return addNames(found, referringClasses(classes_, operation));
-    addWhole(found, [&](ResultSink& sink) {
-        manager_.referenceNames(request.context(), *operation.path, associationOf(operation), sink);
-    });
+    addWhole(found,
+        manager_.referenceNames(request.context(), *operation.path, associationOf(operation)));
 }
 
 } // namespace Host

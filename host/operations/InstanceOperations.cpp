@@ -27,19 +27,16 @@ void InstanceOperations::enumerate(
     const Operation& operation, Request& request, FoundObjects& found) const
 {
     PropertyNames properties(operation.selection.properties);
-    addWhole(found, [&](ResultSink& sink) {
-        manager_.enumerateInstances(request.context(),
-            request.makePath(operation.nameSpace, operation.className), properties.get(), sink);
-    });
+    addWhole(
+        found, manager_.enumerateInstances(request.context(),
+                   request.makePath(operation.nameSpace, operation.className), properties.get()));
 }
 
 void InstanceOperations::enumerateNames(
     const Operation& operation, Request& request, FoundObjects& found) const
 {
-    addWhole(found, [&](ResultSink& sink) {
-        manager_.enumerateInstanceNames(
-            request.context(), request.makePath(operation.nameSpace, operation.className), sink);
-    });
+    addWhole(found, manager_.enumerateInstanceNames(request.context(),
+                        request.makePath(operation.nameSpace, operation.className)));
 }
 
 void InstanceOperations::getProperty(

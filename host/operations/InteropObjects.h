@@ -24,10 +24,10 @@ inline constexpr const char* registeredProfileClass = "CIM_RegisteredProfile";
 // A snapshot of the objects.
 class InteropObjects {
 public:
-    // The classes must outlive the objects.
+    // REQUIRES: a request runs on this thread. The classes must outlive the objects.
     InteropObjects(const Repository& classes, const std::string& hostName);
 
-    // Returns the instances of the class, which live as long as this object.
+    // Returns the instances of the class, which live as long as the request.
     std::vector<const Instance*> ofClass(std::string_view className) const;
 
 private:
@@ -39,7 +39,7 @@ private:
     void setCodes(Instance& instance, const char* name, unsigned code);
 
     const Repository& classes_;
-    Arena arena_{Arena::Purpose::clone}; // of no request
+    Arena& arena_ = Arena::required();
     std::vector<const Instance*> objects_;
 };
 

@@ -90,19 +90,11 @@ std::vector<ProviderRegistration> InteropProvider::registrations()
 {
     std::vector<ProviderRegistration> all;
     for (const char* const className : {objectManagerClass, namespaceClass, registeredProfileClass})
-        all.push_back({className, interopProviderName, {}, true, false});
+        all.push_back({.className = className,
+            .providerName = interopProviderName,
+            .libraryFile = {},
+            .instanceMI = &mi_});
     return all;
-}
-
-CMPIInstanceMI& ProvidersWithInterop::instanceMI(const ProviderRegistration& registration)
-{
-    return registration.providerName == interopProviderName ? interop_.instanceMI()
-                                                            : loaded_.instanceMI(registration);
-}
-
-CMPIAssociationMI& ProvidersWithInterop::associationMI(const ProviderRegistration& registration)
-{
-    return loaded_.associationMI(registration);
 }
 
 } // namespace Host

@@ -5,7 +5,6 @@
 #pragma once
 
 #include "host/manager/ProviderRegistration.h"
-#include "host/manager/ProviderSource.h"
 #include "host/operations/HostName.h"
 #include "host/operations/InteropObjects.h"
 
@@ -25,35 +24,16 @@ public:
     InteropProvider(const InteropProvider&) = delete;
     InteropProvider& operator=(const InteropProvider&) = delete;
 
-    CMPIInstanceMI& instanceMI() noexcept { return mi_; }
-
     // Returns the current objects.
     InteropObjects objects() const { return {classes_, hostName_()}; }
 
-    // Returns the registrations of the classes it serves, which name no library.
-    static std::vector<ProviderRegistration> registrations();
+    // Returns the registrations of the classes it serves, for a manager that it must outlive.
+    std::vector<ProviderRegistration> registrations();
 
 private:
     const Repository& classes_;
     const HostName hostName_;
     CMPIInstanceMI mi_;
-};
-
-// The interop provider beside those that are loaded from files.
-class ProvidersWithInterop : public ProviderSource {
-public:
-    // Both must outlive it.
-    ProvidersWithInterop(const Broker& broker, InteropProvider& interop)
-        : interop_(interop), loaded_(broker)
-    {
-    }
-
-    CMPIInstanceMI& instanceMI(const ProviderRegistration& registration) override;
-    CMPIAssociationMI& associationMI(const ProviderRegistration& registration) override;
-
-private:
-    InteropProvider& interop_;
-    LoadedProviders loaded_;
 };
 
 } // namespace Host

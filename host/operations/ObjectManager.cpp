@@ -10,9 +10,10 @@ namespace Host {
 
 namespace {
 
-std::vector<ProviderRegistration> withInterop(std::vector<ProviderRegistration> registrations)
+std::vector<ProviderRegistration> withInterop(
+    std::vector<ProviderRegistration> registrations, InteropProvider& interop)
 {
-    for (ProviderRegistration& each : InteropProvider::registrations())
+    for (ProviderRegistration& each : interop.registrations())
         registrations.push_back(std::move(each));
     return registrations;
 }
@@ -23,10 +24,7 @@ ObjectManager::ObjectManager(const Repository& classes,
     std::vector<ProviderRegistration> registrations, const HostName& hostName,
     const OperationLimits& limits)
     : interop_(classes, hostName),
-      manager_(classes, withInterop(std::move(registrations)),
-          [this](const Broker& broker) {
-              return std::make_unique<ProvidersWithInterop>(broker, interop_);
-          }),
+      manager_(classes, withInterop(std::move(registrations), interop_)),
       dispatcher_(classes, manager_, hostName, limits)
 {
 }

@@ -15,8 +15,7 @@ namespace Host {
 
 class ObjectManager : public CimXml::OperationHandler {
 public:
-    // Serves the registered classes and root/interop. A library is loaded when it is first needed,
-    // unless the manager has loaded it before; operations on one that cannot be loaded fail. The
+    // Serves the registered classes and root/interop. Throws as the manager's constructor does. The
     // classes must outlive the object manager, which must outlive its responses.
     ObjectManager(const Repository& classes, std::vector<ProviderRegistration> registrations,
         const HostName& hostName, const OperationLimits& limits = {});

@@ -10,13 +10,10 @@
 
 namespace Host {
 
-// Runs an operation that delivers to a sink and adds what it has delivered. Throws Refusal
-// (CMPI_RC_ERR_FAILED) when it could not deliver an object, which the response would lack.
-template <typename Operation>
-void addWhole(FoundObjects& found, const Operation& operation)
+// Adds all that providers delivered. Throws Refusal (CMPI_RC_ERR_FAILED) when a part of it was no
+// object, which the response would lack.
+inline void addWhole(FoundObjects& found, const CollectedResult& result)
 {
-    CollectedResult result;
-    operation(result);
     if (result.refused() != 0)
         throw Refusal(CMPI_RC_ERR_FAILED,
             "the provider could not build " + std::to_string(result.refused()) + " of the objects");

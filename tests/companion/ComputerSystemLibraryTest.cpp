@@ -39,7 +39,7 @@ TEST(ComputerSystemLibrary, isUsedAndUnloadedOverAndOver)
         Host::Broker broker;
         Host::ProviderLibrary loaded(broker, library);
         Host::Request request(broker);
-        CMPIInstanceMI& mi = loaded.instanceMI("ComputerSystemProvider");
+        CMPIInstanceMI& mi = loaded.createInstanceMI("ComputerSystemProvider");
         Host::CollectedResult answer;
         Host::Result result(answer);
         const CMPIStatus status =

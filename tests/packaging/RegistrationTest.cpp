@@ -40,9 +40,7 @@ std::vector<Registration> embeddedTable()
     std::vector<Registration> table;
     for (const Host::ProviderRegistration& each :
         Host::sensorProfileProviders("SensorProfileProvider", "ComputerSystemProvider")) {
-        std::string kinds = each.servesInstances ? "instance" : "";
-        if (each.servesAssociations)
-            kinds += " association";
+        const std::string kinds = each.servesAssociations ? "instance association" : "instance";
         table.push_back({each.className, each.providerName, each.libraryFile, kinds, nameSpace});
     }
     return table;

@@ -11,7 +11,6 @@
 #include "host/broker/ObjectPath.h"
 #include "host/broker/Refusal.h"
 
-#include <algorithm>
 #include <string>
 #include <utility>
 #include <vector>
@@ -41,34 +40,24 @@ public:
         const Host::Context& context, const Host::ObjectPath& path) override
     {
         record("enumerateInstanceNames", context, path, nullptr);
-        Host::Enumeration& answer = Host::Enumeration::make(Host::Arena::required(), CMPI_ref);
+        std::vector<Host::Value> answer;
         for (const std::string& name : names) {
             addStrangers(answer, CMPI_ref, Host::Value::of(instance(name)));
-            answer.add(Host::Value::of(pathTo(name)));
+            answer.push_back(Host::Value::of(pathTo(name)));
         }
-        return answer;
+        return Host::Enumeration::make(Host::Arena::required(), answer);
     }
 
     Host::Enumeration& enumerateInstances(const Host::Context& context,
         const Host::ObjectPath& path, const char** properties) override
     {
         record("enumerateInstances", context, path, properties);
-        Host::Enumeration& answer = Host::Enumeration::make(Host::Arena::required(), CMPI_instance);
+        std::vector<Host::Value> answer;
         for (const std::string& name : names) {
             addStrangers(answer, CMPI_instance, Host::Value::of(pathTo(name)));
-            answer.add(Host::Value::of(instance(name)));
+            answer.push_back(Host::Value::of(instance(name)));
         }
-        return answer;
-    }
-
-    Host::Instance& getInstance(const Host::Context& context, const Host::ObjectPath& path,
-        const char** properties) override
-    {
-        record("getInstance", context, path, properties);
-        const Host::Value* const name = path.key("Name");
-        if (name == nullptr || std::find(names.begin(), names.end(), *name->text()) == names.end())
-            throw Host::Refusal(CMPI_RC_ERR_NOT_FOUND, "no such system");
-        return instance(std::string(*name->text()));
+        return Host::Enumeration::make(Host::Arena::required(), answer);
     }
 
     Host::ObjectPath& pathTo(const std::string& name) const
@@ -99,15 +88,15 @@ private:
     }
 
     void addStrangers(
-        Host::Enumeration& answer, CMPIType type, const Host::Value& theOtherKind) const
+        std::vector<Host::Value>& answer, CMPIType type, const Host::Value& theOtherKind) const
     {
         if (!isMixed)
             return;
-        answer.add(Host::Value::text(Host::Arena::required(), "a text"));
-        answer.add(Host::Value::integer(CMPI_uint64, 7));
-        answer.add(Host::Value::null(type));
-        answer.add(Host::Value::absent());
-        answer.add(theOtherKind);
+        answer.push_back(Host::Value::text(Host::Arena::required(), "a text"));
+        answer.push_back(Host::Value::integer(CMPI_uint64, 7));
+        answer.push_back(Host::Value::null(type));
+        answer.push_back(Host::Value::absent());
+        answer.push_back(theOtherKind);
     }
 };
 

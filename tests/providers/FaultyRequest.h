@@ -35,10 +35,7 @@ public:
     FaultyRequest(Host::Broker& broker, FaultyBroker& faulty, const RequestKind& kind)
         : request_(broker)
     {
-        broker.setTraceObserver([this](const Host::TraceMessage& message) {
-            messages.push_back({static_cast<unsigned>(message.level),
-                std::string(message.component), std::string(message.text)});
-        });
+        const TraceRecorder recorder(faulty.handle());
         const CMPIObjectPath* const source = faulty.watch(kind.source(request_).handle());
         const Strings recording(faulty.handle()->eft, &strings_);
         CMPIBrokerEncFT functions = *faulty.handle()->eft;
@@ -47,7 +44,7 @@ public:
         recorded.eft = &functions;
         status = kind.run(
             &recorded, request_.context().handle(), faulty.watch(result_.handle()), source);
-        broker.setTraceObserver({});
+        messages = recorder.messages;
     }
 
     std::string message() const { return textOf(status.msg); }

@@ -4,14 +4,14 @@
 
 #pragma once
 
-#include "host/broker/ClassInformation.h"
+#include "tests/support/ClassTable.h"
 
 namespace Testing {
 
-inline const Host::ClassTable& profileClasses()
+inline const ClassTable& profileClasses()
 {
-    static const Host::ClassTable classes = [] {
-        Host::ClassTable table;
+    static const ClassTable classes = [] {
+        ClassTable table;
         table.add("ZUMLO_NumericSensor",
             {"CreationClassName", "DeviceID", "SystemCreationClassName", "SystemName"});
         table.add("ZUMLO_SensorEnabledLogicalElementCapabilities", {"InstanceID"});

@@ -3,7 +3,7 @@
 // How requests of ZUMLO_NumericSensor end: found by the whole path, closed before they are left,
 // or thrown out of.
 
-#include "tests/providers/ClosingSink.h"
+#include "tests/providers/ClosingResult.h"
 #include "tests/providers/Factories.h"
 #include "tests/support/FaultyBroker.h"
 #include "tests/support/ProviderTest.h"
@@ -121,12 +121,11 @@ TEST_F(SensorProviderAnswerTest, theResultIsClosedBetweenTheMarks)
     });
     for (const auto& request : all) {
         const LogCapture capture;
-        ClosingSink sink(capture);
-        Host::Result into(sink);
-        request(into.handle());
-        EXPECT_TRUE(sink.isDone());
-        EXPECT_GE(sink.linesBefore.size(), 2U);
-        EXPECT_THAT(sink.linesBefore, Not(Contains(::testing::Truly(isExitMark))));
+        const ClosingResult closing(capture);
+        request(closing.handle());
+        EXPECT_TRUE(closing.answer.isDone());
+        EXPECT_GE(closing.linesBefore.size(), 2U);
+        EXPECT_THAT(closing.linesBefore, Not(Contains(::testing::Truly(isExitMark))));
         EXPECT_THAT(capture.log(), Contains(::testing::Truly(isExitMark)));
     }
 }

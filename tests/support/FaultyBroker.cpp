@@ -10,6 +10,7 @@
 #include "host/broker/Result.h"
 #include "host/broker/String.h"
 #include "host/broker/Tables.h"
+#include "tests/support/TraceRecorder.h"
 
 #include <tuple>
 #include <type_traits>
@@ -24,7 +25,7 @@ thread_local FaultyBroker* inForce = nullptr;
 template <typename Table>
 const Table& realTable()
 {
-    return std::get<const Table&>(std::tie(Host::upcallFunctions, Host::encapsulationFunctions,
+    return std::get<const Table&>(std::tie(Host::upcallFunctions, TraceRecorder::functions(),
         Host::String::functions, Host::Array::functions, Host::ObjectPath::functions,
         Host::Instance::functions, Host::Enumeration::functions, Host::Result::functions));
 }

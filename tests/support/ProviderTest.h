@@ -14,31 +14,17 @@
 #include "tests/support/Describe.h"
 #include "tests/support/LogCapture.h"
 #include "tests/support/ScriptedMachine.h"
+#include "tests/support/TraceRecorder.h"
 
 #include <gtest/gtest.h>
 
 #include <memory>
-#include <ostream>
 #include <string>
 #include <string_view>
 #include <utility>
 #include <vector>
 
 namespace Testing {
-
-// A message to the broker's trace facility.
-struct BrokerMessage {
-    unsigned level;
-    std::string component;
-    std::string text;
-
-    bool operator==(const BrokerMessage&) const = default;
-};
-
-inline std::ostream& operator<<(std::ostream& out, const BrokerMessage& message)
-{
-    return out << message.level << ' ' << message.component << ": " << message.text;
-}
 
 inline std::string textOf(const CMPIString* string)
 {
@@ -49,15 +35,6 @@ inline std::string textOf(const CMPIString* string)
 class ProviderTest : public ::testing::Test {
 protected:
     static constexpr const char* NameSpace = "root/cimv2";
-
-    ProviderTest()
-    {
-        broker_.setTraceObserver([this](const Host::TraceMessage& message) {
-            messages_.push_back({static_cast<unsigned>(message.level),
-                std::string(message.component), std::string(message.text)});
-        });
-        request_ = std::make_unique<Host::Request>(broker_);
-    }
 
     // A path with text keys in the request's namespace.
     Host::ObjectPath& path(const char* className,
@@ -70,15 +47,16 @@ protected:
         return made;
     }
 
-    const CMPIBroker* broker() const { return broker_.handle(); }
+    const CMPIBroker* broker() const { return recorder_.handle(); }
     const CMPIContext* context() { return request_->context().handle(); }
     const CMPIResult* result() const { return result_.handle(); }
 
     Host::Broker broker_;
-    std::unique_ptr<Host::Request> request_;
+    TraceRecorder recorder_{broker_.handle()};
+    std::vector<BrokerMessage>& messages_ = recorder_.messages;
+    std::unique_ptr<Host::Request> request_ = std::make_unique<Host::Request>(broker_);
     Host::CollectedResult answer_;
     Host::Result result_{answer_};
-    std::vector<BrokerMessage> messages_;
     const std::string systemName_ = Vorn::getSystemName();
 };
 

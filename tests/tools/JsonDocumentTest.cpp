@@ -84,8 +84,8 @@ TEST_F(JsonDocumentTest, EachTypeHasItsForm)
     instance_.setProperty("Flag", Host::Value::boolean(true));
     instance_.setProperty("Real", Host::Value::real(CMPI_real64, 0.5));
     instance_.setProperty("Path", Host::Value::of(request_.makePath("root/cimv2", "Other")));
-    instance_.setProperty(
-        "Time", Host::Value::of(Host::DateTime::make(request_.arena(), 0, false)));
+    instance_.setProperty("Time",
+        Host::Value::of(Host::DateTime::parse(request_.arena(), "19700101000000.000000+000")));
     setCodes("List", {1, 2});
     setCodes("EmptyList", {});
     EXPECT_EQ(properties(),

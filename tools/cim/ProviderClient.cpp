@@ -45,8 +45,8 @@ Instances ProviderClient::instances(const std::string& className)
 {
     Host::CollectedResult answer;
     try {
-        manager_.enumerateInstances(
-            request_->context(), request_->makePath(nameSpace, className), nullptr, answer);
+        answer = manager_.enumerateInstances(
+            request_->context(), request_->makePath(nameSpace, className), nullptr);
     } catch (const Host::Refusal& refusal) {
         fail(refusal);
     }

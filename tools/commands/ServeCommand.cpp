@@ -174,7 +174,6 @@ public:
             Host::sensorProfileProviders(files.sensors, files.computerSystem), Vorn::getSystemName,
             options_.operations);
         MemoryReturn operations(objects);
-        objects.manager().preload();
         beginLog(renounceRoot(options_.user), out);
         for (const std::string& file : modelFiles())
             requireReadable(file);

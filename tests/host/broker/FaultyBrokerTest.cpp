@@ -13,6 +13,7 @@
 
 #include <map>
 #include <thread>
+#include <vector>
 
 namespace HostTests {
 
@@ -22,28 +23,19 @@ using Testing::FaultyBroker;
 
 namespace {
 
-class TwoNames : public Host::BrokerUpcalls {
+class TwoObjects : public Host::BrokerUpcalls {
     Host::Enumeration& enumerateInstanceNames(
         const Host::Context&, const Host::ObjectPath& path) override
     {
-        Host::Arena& arena = Host::Arena::required();
-        Host::Enumeration& answer = Host::Enumeration::make(arena, CMPI_ref);
-        for (int i = 0; i < 2; ++i)
-            answer.add(Host::Value::of(path.copiedTo(arena)));
-        return answer;
+        const std::vector twice(2, Host::Value::of(path));
+        return Host::Enumeration::make(Host::Arena::required(), twice);
     }
     Host::Enumeration& enumerateInstances(
         const Host::Context&, const Host::ObjectPath& path, const char**) override
     {
         Host::Arena& arena = Host::Arena::required();
-        Host::Enumeration& answer = Host::Enumeration::make(arena, CMPI_instance);
-        answer.add(Host::Value::of(Host::Instance::make(arena, path, nullptr)));
-        return answer;
-    }
-    Host::Instance& getInstance(
-        const Host::Context&, const Host::ObjectPath& path, const char**) override
-    {
-        return Host::Instance::make(Host::Arena::required(), path, nullptr);
+        const std::vector twice(2, Host::Value::of(Host::Instance::make(arena, path, nullptr)));
+        return Host::Enumeration::make(arena, twice);
     }
 };
 
@@ -108,7 +100,7 @@ protected:
         runProvider(faulty.handle(), faulty.watch(ref.handle()), faulty.watch(result.handle()));
     }
 
-    TwoNames upcalls;
+    TwoObjects upcalls;
 };
 
 TEST_F(FaultyBrokerTest, CountsEveryKindOfCall)

@@ -2,9 +2,10 @@
 
 #include "host/broker/Instance.h"
 
-#include "host/broker/ClassInformation.h"
+#include "host/broker/Array.h"
 #include "host/broker/String.h"
 #include "tests/host/broker/BrokerTest.h"
+#include "tests/support/ClassTable.h"
 
 namespace HostTests {
 
@@ -14,9 +15,9 @@ protected:
     {
         EXPECT_EQ(CMSetProperty(object, name, text, CMPI_chars).rc, CMPI_RC_OK);
     }
-    static std::string get(const CMPIInstance* object, const char* name)
+    static const Host::Value* property(const CMPIInstance* object, const char* name)
     {
-        return textOf(CMGetProperty(object, name, nullptr));
+        return Host::Instance::of(object)->property(name);
     }
     // Names and values in order, as in "A=1,B=2".
     static std::string propertiesOf(const CMPIInstance* object)
@@ -31,7 +32,7 @@ protected:
     }
     static std::string keysOf(const CMPIInstance* object)
     {
-        return textOf(CMObjectPathToString(CMGetObjectPath(object, nullptr), nullptr));
+        return Host::ObjectPath::of(CMGetObjectPath(object, nullptr))->toText();
     }
     static void filter(
         CMPIInstance* object, std::vector<const char*> properties, std::vector<const char*> keys)
@@ -60,28 +61,14 @@ TEST_F(InstanceTest, KeepsPropertiesInTheOrderTheyWereSet)
         set(made, name, name);
     set(made, "a", "again");
     EXPECT_EQ(propertiesOf(made), "B=B,A=again,E=E,D=D,C=C");
-    EXPECT_EQ(CMGetPropertyCount(made, nullptr), 5U);
-    CMPIString* name = nullptr;
-    EXPECT_EQ(textOf(CMGetPropertyAt(made, 4, &name, &rc)), "C");
-    EXPECT_EQ(textOf(name), "C");
 }
 
 TEST_F(InstanceTest, FindsAPropertyWithoutRegardToLetterCase)
 {
     CMPIInstance* const made = instance();
     set(made, "ElementName", "Fan");
-    EXPECT_EQ(get(made, "elementNAME"), "Fan");
-}
-
-TEST_F(InstanceTest, AMissingPropertyIsNotFound)
-{
-    CMPIInstance* const made = instance();
-    EXPECT_EQ(CMGetProperty(made, "A", &rc).state, absentState);
-    EXPECT_EQ(rc.rc, CMPI_RC_ERR_NO_SUCH_PROPERTY);
-    EXPECT_EQ(CMGetPropertyAt(made, 0, nullptr, &rc).state, absentState);
-    EXPECT_EQ(rc.rc, CMPI_RC_ERR_NO_SUCH_PROPERTY);
-    CMGetProperty(made, nullptr, &rc);
-    EXPECT_EQ(rc.rc, CMPI_RC_ERR_INVALID_PARAMETER);
+    EXPECT_EQ(property(made, "elementNAME")->text(), "Fan");
+    EXPECT_EQ(property(made, "Other"), nullptr);
     EXPECT_EQ(CMSetProperty(made, nullptr, "1", CMPI_chars).rc, CMPI_RC_ERR_INVALID_PARAMETER);
 }
 
@@ -90,11 +77,9 @@ TEST_F(InstanceTest, ANullValueIsANullProperty)
     CMPIInstance* const made = instance();
     EXPECT_EQ(CMSetProperty(made, "A", nullptr, CMPI_uint16).rc, CMPI_RC_OK);
     EXPECT_EQ(CMSetProperty(made, "B", nullptr, CMPI_chars).rc, CMPI_RC_OK);
-    const CMPIData number = CMGetProperty(made, "A", &rc);
-    EXPECT_EQ(rc.rc, CMPI_RC_OK);
-    EXPECT_EQ(number.type, CMPI_uint16);
-    EXPECT_EQ(number.state, CMPI_nullValue);
-    EXPECT_EQ(CMGetProperty(made, "B", nullptr).type, CMPI_string);
+    EXPECT_EQ(property(made, "A")->type(), CMPI_uint16);
+    EXPECT_TRUE(property(made, "A")->isNull());
+    EXPECT_EQ(property(made, "B")->type(), CMPI_string);
 }
 
 TEST_F(InstanceTest, CopiesArraysDeep)
@@ -104,12 +89,9 @@ TEST_F(InstanceTest, CopiesArraysDeep)
     CMSetProperty(made, "A", &numbers, CMPI_uint16A);
     const CMPIUint16 changed = 9;
     CMSetArrayElementAt(numbers, 0, &changed, CMPI_uint16);
-    const CMPIData first = CMGetProperty(made, "A", nullptr);
-    EXPECT_EQ(CMGetArrayElementAt(first.value.array, 0, nullptr).value.uint16, 1);
-    CMSetArrayElementAt(first.value.array, 1, &changed, CMPI_uint16);
-    const CMPIData second = CMGetProperty(made, "A", nullptr);
-    EXPECT_EQ(CMGetArrayElementAt(second.value.array, 1, nullptr).value.uint16, 2);
-    EXPECT_EQ(CMGetArrayElementAt(numbers, 0, nullptr).value.uint16, 9);
+    const auto elements = property(made, "A")->array()->elements();
+    EXPECT_EQ(elements[0].unsignedInteger(), 1U);
+    EXPECT_EQ(Host::Array::of(numbers)->elements()[0].unsignedInteger(), 9U);
 }
 
 TEST_F(InstanceTest, CopiesEmbeddedInstancesDeep)
@@ -119,7 +101,7 @@ TEST_F(InstanceTest, CopiesEmbeddedInstancesDeep)
     set(embedded, "A", "before");
     CMSetProperty(made, "I", &embedded, CMPI_instance);
     set(embedded, "A", "after");
-    EXPECT_EQ(get(CMGetProperty(made, "I", nullptr).value.inst, "A"), "before");
+    EXPECT_EQ(property(made, "I")->instance()->property("A")->text(), "before");
 }
 
 TEST_F(InstanceTest, TheFilterDropsWhatIsNeitherListedNorAKey)
@@ -218,7 +200,7 @@ TEST_F(InstanceTest, KeysThatTheInstanceLacksAreLeftOut)
 
 TEST_F(InstanceTest, WhatIsKnownAboutTheClassWinsOverTheFiltersKeyNames)
 {
-    Host::ClassTable classes;
+    Testing::ClassTable classes;
     classes.add("Test_Class", {"DeviceID"});
     broker.setClassInformation(&classes);
     CMPIInstance* const made = instance("test_CLASS");
@@ -232,7 +214,7 @@ TEST_F(InstanceTest, WhatIsKnownAboutTheClassWinsOverTheFiltersKeyNames)
 
 TEST_F(InstanceTest, OfAClassThatIsNotKnownTheFiltersKeyNamesCount)
 {
-    Host::ClassTable classes;
+    Testing::ClassTable classes;
     classes.add("Other_Class", {"DeviceID"});
     broker.setClassInformation(&classes);
     CMPIInstance* const made = instance();
@@ -273,21 +255,6 @@ TEST_F(InstanceTest, KeepsItsOwnCopyOfThePath)
     CMSetNameSpace(given, "changed");
     CMAddKey(given, "A", "changed", CMPI_chars);
     EXPECT_EQ(keysOf(made), "root/cimv2:Test_Class.A=\"1\"");
-}
-
-TEST_F(InstanceTest, TakesAnotherPath)
-{
-    CMPIInstance* const made = instance();
-    EXPECT_EQ(CMSetObjectPath(made, path("Other")).rc, CMPI_RC_OK);
-    EXPECT_EQ(keysOf(made), "root/cimv2:Other");
-    EXPECT_EQ(CMSetObjectPath(made, nullptr).rc, CMPI_RC_ERR_INVALID_HANDLE);
-}
-
-TEST_F(InstanceTest, TakesPropertiesWithAnOrigin)
-{
-    CMPIInstance* const made = instance();
-    EXPECT_EQ(CMSetPropertyWithOrigin(made, "A", "1", CMPI_chars, "Base").rc, CMPI_RC_OK);
-    EXPECT_EQ(get(made, "A"), "1");
 }
 
 } // namespace HostTests

@@ -59,19 +59,6 @@ TEST_F(ObjectPathTest, AHostTakenAwayReadsAsAStringWithoutCharacters)
     EXPECT_EQ(CMGetCharPtr(host), nullptr);
 }
 
-TEST_F(ObjectPathTest, TakesNamespaceAndHostFromAnotherPath)
-{
-    CMPIObjectPath* const source = CMNewObjectPath(mb, "root/interop", "Source", nullptr);
-    CMSetHostname(source, "source.example");
-    CMPIObjectPath* const made = path();
-    EXPECT_EQ(CMSetNameSpaceFromObjectPath(made, source).rc, CMPI_RC_OK);
-    EXPECT_EQ(textOf(CMGetNameSpace(made, nullptr)), "root/interop");
-    EXPECT_EQ(textOf(CMGetHostname(made, nullptr)), "");
-    EXPECT_EQ(CMSetHostAndNameSpaceFromObjectPath(made, source).rc, CMPI_RC_OK);
-    EXPECT_EQ(textOf(CMGetHostname(made, nullptr)), "source.example");
-    EXPECT_EQ(CMSetNameSpaceFromObjectPath(made, nullptr).rc, CMPI_RC_ERR_INVALID_HANDLE);
-}
-
 TEST_F(ObjectPathTest, KeepsKeysInTheOrderTheyWereAdded)
 {
     CMPIObjectPath* const made = path();
@@ -195,16 +182,15 @@ TEST_F(ObjectPathTest, IsWrittenAsAUri)
     CMPIObjectPath* const made = path();
     const CMPISint32 number = -5;
     const CMPIBoolean yes = 1;
-    EXPECT_EQ(textOf(CMObjectPathToString(made, &rc)), "root/cimv2:Test_Class");
+    EXPECT_EQ(Host::ObjectPath::of(made)->toText(), "root/cimv2:Test_Class");
     CMSetHostname(made, "host.example");
     CMAddKey(made, "ID", "a\"b\\c", CMPI_chars);
     CMAddKey(made, "Number", &number, CMPI_sint32);
     CMAddKey(made, "Yes", &yes, CMPI_boolean);
     CMAddKey(made, "Ref", &reference, CMPI_ref);
-    EXPECT_EQ(textOf(CMObjectPathToString(made, &rc)),
+    EXPECT_EQ(Host::ObjectPath::of(made)->toText(),
         "//host.example/root/cimv2:Test_Class.ID=\"a\\\"b\\\\c\",Number=-5,Yes=TRUE,"
         "Ref=\"root/cimv2:Referred.Name=\\\"x\\\"\"");
-    EXPECT_EQ(rc.rc, CMPI_RC_OK);
 }
 
 TEST_F(ObjectPathTest, IsReadByTheHostWithoutTheTable)
@@ -222,15 +208,6 @@ TEST_F(ObjectPathTest, IsReadByTheHostWithoutTheTable)
         EXPECT_EQ(name->text(), "DeviceID");
         EXPECT_EQ(value.text(), "fan1");
     }
-}
-
-TEST_F(ObjectPathTest, OffersNoQualifiers)
-{
-    CMPIObjectPath* const made = path();
-    CMGetClassQualifier(made, "Key", &rc);
-    EXPECT_EQ(rc.rc, CMPI_RC_ERR_NOT_SUPPORTED);
-    CMGetParameterQualifier(made, "M", "P", "Key", &rc);
-    EXPECT_EQ(rc.rc, CMPI_RC_ERR_NOT_SUPPORTED);
 }
 
 } // namespace HostTests

@@ -16,6 +16,7 @@
 #include "host/broker/String.h"
 #include "host/manager/Manager.h"
 #include "tests/host/manager/ScriptedProvider.h"
+#include "tests/support/ClassTable.h"
 
 #include <cmpimacs.h>
 
@@ -102,8 +103,7 @@ protected:
 
     const Host::Context& context() { return request_->context(); }
 
-    static Host::ClassTable classes();
-    static std::vector<Host::ProviderRegistration> registrations();
+    static ClassTable classes();
 
     // The classes of what was delivered.
     static std::vector<std::string> delivered(const Host::CollectedResult& answer)
@@ -116,18 +116,20 @@ protected:
         return classes;
     }
 
-    const Host::ClassTable classes_ = classes();
+    const ClassTable classes_ = classes();
     ScriptedProviders providers_;
     std::vector<std::string> calls_;
-    Host::Manager manager_{classes_, registrations(),
-        [this](const Host::Broker&) { return std::make_unique<ScriptedSource>(providers_); }};
+    Host::Manager manager_{classes_,
+        {registration(providers_, "Box", "Boxes"), registration(providers_, "Part", "Parts"),
+            registration(providers_, "SpecialPart", "SpecialParts"),
+            registration(providers_, "BoxLink", "BoxLinks", true),
+            registration(providers_, "ThingLink", "ThingLinks", true)}};
     std::optional<Host::Request> request_{std::in_place, manager_.broker()};
-    Host::CollectedResult answer_;
 };
 
-inline Host::ClassTable ManagerTest::classes()
+inline ClassTable ManagerTest::classes()
 {
-    Host::ClassTable classes;
+    ClassTable classes;
     classes.add("Thing", {});
     classes.add("Box", {"Name"}, "Thing");
     classes.add("Part", {"Name"}, "Thing");
@@ -137,12 +139,6 @@ inline Host::ClassTable ManagerTest::classes()
     classes.add("BoxLink", {"Whole", "Piece"}, "Link", {{"Whole", "Box"}, {"Piece", "Part"}});
     classes.add("ThingLink", {"Whole", "Piece"}, "Link", {{"Whole", "Box"}, {"Piece", "Thing"}});
     return classes;
-}
-
-inline std::vector<Host::ProviderRegistration> ManagerTest::registrations()
-{
-    return {{"Box", "Boxes", {}}, {"Part", "Parts", {}}, {"SpecialPart", "SpecialParts", {}},
-        {"BoxLink", "BoxLinks", {}, true, true}, {"ThingLink", "ThingLinks", {}, true, true}};
 }
 
 } // namespace Testing

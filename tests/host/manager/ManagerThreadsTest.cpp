@@ -3,9 +3,6 @@
 // Many requests at once.
 
 #include "tests/host/manager/ManagerTest.h"
-#include "tests/host/manager/OddProvider.h"
-
-#include <dlfcn.h>
 
 #include <atomic>
 #include <thread>
@@ -57,39 +54,15 @@ TEST_F(ManagerThreadsTest, everyRequestGetsItsWholeAnswer)
     onThreads([&] {
         for (int i = 0; i < 50; ++i) {
             Host::Request request(manager_.broker());
-            Host::CollectedResult found;
-            manager_.enumerateInstances(
-                request.context(), request.makePath(Testing::NameSpace, "Thing"), nullptr, found);
-            Host::CollectedResult names;
-            manager_.associatorNames(
-                request.context(), request.makePath(Testing::NameSpace, "Box"), {}, names);
+            const auto found = manager_.enumerateInstances(
+                request.context(), request.makePath(Testing::NameSpace, "Thing"), nullptr);
+            const auto names = manager_.associatorNames(
+                request.context(), request.makePath(Testing::NameSpace, "Box"), {});
             if (found.instances().size() != 4 || names.paths().size() != 1)
                 ++wrong;
         }
     });
     EXPECT_EQ(wrong, 0);
-}
-
-TEST(LoadedProvidersThreads, makeEachInterfaceOnce)
-{
-    const std::string file = SENSOR_PROFILE_BINARY_DIR "/lib/libOddProvider.so";
-    void* const witness = ::dlopen(file.c_str(), RTLD_NOW | RTLD_LOCAL);
-    const auto report =
-        reinterpret_cast<Testing::OddProviderReportFunction>(::dlsym(witness, "oddProviderReport"));
-    const Host::Broker broker;
-    {
-        Host::LoadedProviders providers(broker);
-        const Host::ProviderRegistration registration = {"Any", "Leaving", file, true, true};
-        onThreads([&] {
-            for (int i = 0; i < 20; ++i) {
-                providers.instanceMI(registration);
-                providers.associationMI(registration);
-            }
-        });
-        EXPECT_EQ(report()->created, 2);
-    }
-    EXPECT_EQ(report()->cleanedUp, 2);
-    ::dlclose(witness);
 }
 
 } // namespace ManagerThreadsTests

@@ -12,12 +12,9 @@ struct OddProviderReport {
     int created = 0;
     int cleanedUp = 0;
     int cleanedUpWithContext = 0;
+    CMPIrc upcall = CMPI_RC_OK; // of the factory that calls up
 };
 
-// What the factories of the provider Hooked call before they make anything.
-using OddProviderHook = void (*)(const CMPIBroker*, const CMPIContext*, bool isOfAssociations);
-
-using OddProviderSetHookFunction = void (*)(OddProviderHook);
 using OddProviderReportFunction = const OddProviderReport* (*)();
 
 } // namespace Testing

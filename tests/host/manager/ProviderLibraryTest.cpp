@@ -4,7 +4,9 @@
 
 #include "host/broker/Broker.h"
 #include "host/broker/Request.h"
+#include "host/manager/Manager.h"
 #include "tests/host/manager/OddProvider.h"
+#include "tests/support/ClassTable.h"
 #include "tests/support/TemporaryFolder.h"
 
 #include <gmock/gmock.h>
@@ -16,6 +18,8 @@
 #include <memory>
 #include <optional>
 #include <stdexcept>
+#include <utility>
+#include <vector>
 
 namespace ProviderLibraryTests {
 
@@ -83,14 +87,12 @@ TEST_F(ProviderLibraryTest, KeepsItsSymbolsToItself)
     EXPECT_EQ(::dlsym(RTLD_DEFAULT, "oddProviderReport"), nullptr);
 }
 
-TEST_F(ProviderLibraryTest, MakesEachManagementInterfaceOnce)
+TEST_F(ProviderLibraryTest, CreatesManagementInterfaces)
 {
     const Witness witness;
     Host::ProviderLibrary library(broker_, oddProvider);
-    CMPIInstanceMI& first = library.instanceMI("Leaving");
-    EXPECT_EQ(&library.instanceMI("Leaving"), &first);
-    EXPECT_EQ(witness.report().created, 1);
-    EXPECT_EQ(library.associationMI("Leaving").ft->ftVersion, 200);
+    EXPECT_EQ(library.createInstanceMI("Leaving").ft->ftVersion, 200);
+    EXPECT_EQ(library.createAssociationMI("Leaving").ft->ftVersion, 200);
     EXPECT_EQ(witness.report().created, 2);
 }
 
@@ -99,8 +101,8 @@ TEST_F(ProviderLibraryTest, LetsEveryManagementInterfaceCleanUpWithAContext)
     const Witness witness;
     {
         Host::ProviderLibrary library(broker_, oddProvider);
-        library.instanceMI("Leaving");
-        library.associationMI("Leaving");
+        library.createInstanceMI("Leaving");
+        library.createAssociationMI("Leaving");
         EXPECT_EQ(witness.report().cleanedUp, 0);
     }
     EXPECT_EQ(witness.report().cleanedUp, 2);
@@ -114,8 +116,8 @@ TEST_F(ProviderLibraryTest, StaysInMemoryWhenACleanupAsksForIt)
     const std::string copy = (folder.path() / "libStaying.so").string();
     std::filesystem::copy_file(oddProvider, copy);
     std::optional<Host::ProviderLibrary> library(std::in_place, broker_, copy);
-    library->instanceMI("Leaving");
-    library->instanceMI("Staying");
+    library->createInstanceMI("Leaving");
+    library->createInstanceMI("Staying");
     library.reset();
     EXPECT_TRUE(isLoaded(copy));
 }
@@ -123,9 +125,9 @@ TEST_F(ProviderLibraryTest, StaysInMemoryWhenACleanupAsksForIt)
 TEST_F(ProviderLibraryTest, ReturnsTheSensorProvidersInterface)
 {
     Host::ProviderLibrary library(broker_, sensorProvider);
-    EXPECT_STREQ(
-        library.instanceMI("SensorProfileProvider").ft->miName, "instanceSensorProfileProvider");
-    EXPECT_STREQ(library.associationMI("SensorSystemDeviceProvider").ft->miName,
+    EXPECT_STREQ(library.createInstanceMI("SensorProfileProvider").ft->miName,
+        "instanceSensorProfileProvider");
+    EXPECT_STREQ(library.createAssociationMI("SensorSystemDeviceProvider").ft->miName,
         "associationSensorSystemDeviceProvider");
 }
 
@@ -141,21 +143,65 @@ TEST_F(ProviderLibraryTest, NamesAFileThatIsMissingOrNoLibrary)
 TEST_F(ProviderLibraryTest, NamesTheFactoryThatIsMissing)
 {
     Host::ProviderLibrary library(broker_, oddProvider);
-    EXPECT_EQ(failureOf([&] { library.instanceMI("Absent"); }),
+    EXPECT_EQ(failureOf([&] { library.createInstanceMI("Absent"); }),
         oddProvider + ": no factory Absent_Create_InstanceMI");
-    EXPECT_EQ(failureOf([&] { library.associationMI("Staying"); }),
+    EXPECT_EQ(failureOf([&] { library.createAssociationMI("Staying"); }),
         oddProvider + ": no factory Staying_Create_AssociationMI");
 }
 
 TEST_F(ProviderLibraryTest, SaysWhyAFactoryRefuses)
 {
     Host::ProviderLibrary library(broker_, oddProvider);
-    EXPECT_EQ(failureOf([&] { library.instanceMI("Refusing"); }),
+    EXPECT_EQ(failureOf([&] { library.createInstanceMI("Refusing"); }),
         oddProvider + ": Refusing_Create_InstanceMI answers code 2: not on this machine");
-    EXPECT_EQ(failureOf([&] { library.instanceMI("Empty"); }),
+    EXPECT_EQ(failureOf([&] { library.createInstanceMI("Empty"); }),
         oddProvider + ": Empty_Create_InstanceMI answers with nothing");
-    EXPECT_EQ(failureOf([&] { library.instanceMI("Ancient"); }),
+    EXPECT_EQ(failureOf([&] { library.createInstanceMI("Ancient"); }),
         oddProvider + ": Ancient_Create_InstanceMI answers with a function table of version 86");
+}
+
+// ---- As the manager uses it ----
+
+class ManagerLoadingTest : public testing::Test {
+protected:
+    static std::string failureOfLoading(std::vector<Host::ProviderRegistration> registrations)
+    {
+        const Testing::ClassTable classes;
+        return failureOf([&] { Host::Manager(classes, std::move(registrations)); });
+    }
+};
+
+TEST_F(ManagerLoadingTest, CreatesEveryInterfaceAtOnce)
+{
+    const Witness witness;
+    {
+        const Testing::ClassTable classes;
+        const Host::Manager manager(classes, {{"BoxLink", "Leaving", oddProvider, true}});
+        EXPECT_EQ(witness.report().created, 2);
+    }
+    EXPECT_EQ(witness.report().cleanedUp, 2);
+}
+
+TEST_F(ManagerLoadingTest, NamesTheLibraryThatCannotBeUsedAndWhy)
+{
+    const Testing::TemporaryFolder folder;
+    const std::string text = folder.write("text.so", "no library");
+    EXPECT_THAT(failureOfLoading({{"Box", "Boxes", text}}),
+        AllOf(testing::StartsWith(text + ": "), HasSubstr("file too short")));
+    EXPECT_EQ(failureOfLoading({{"Box", "Leaving", oddProvider}, {"Part", "Absent", oddProvider}}),
+        oddProvider + ": no factory Absent_Create_InstanceMI");
+    EXPECT_EQ(failureOfLoading({{"BoxLink", "Calling", oddProvider, true}}),
+        oddProvider + ": no factory Calling_Create_AssociationMI");
+}
+
+TEST_F(ManagerLoadingTest, AFactoryThatCallsUpIsRefused)
+{
+    const Witness witness;
+    Testing::ClassTable classes;
+    classes.add("Box", {"Name"});
+    const Host::Manager manager(classes, {{"Box", "Calling", oddProvider}});
+    EXPECT_EQ(witness.report().created, 1);
+    EXPECT_EQ(witness.report().upcall, CMPI_RC_ERR_NOT_SUPPORTED);
 }
 
 TEST_F(ProviderLibraryTest, DescribesAStatusWithAndWithoutMessage)

@@ -4,16 +4,14 @@
 
 #pragma once
 
-#include "host/manager/ProviderSource.h"
+#include "host/manager/ProviderRegistration.h"
 
 #include <cmpidt.h>
 #include <cmpift.h>
 
 #include <functional>
 #include <map>
-#include <stdexcept>
 #include <string>
-#include <vector>
 
 namespace Testing {
 
@@ -90,26 +88,10 @@ inline const CMPIInstanceMIFT ScriptedProvider::instanceTable = {
                                 .path = path,
                                 .properties = properties});
         },
-    .createInstance =
-        [](CMPIInstanceMI* mi, const CMPIContext* context, const CMPIResult* result,
-            const CMPIObjectPath* path, const CMPIInstance*) {
-            return pass(mi, {"createInstance", context, result, path});
-        },
-    .modifyInstance =
-        [](CMPIInstanceMI* mi, const CMPIContext* context, const CMPIResult* result,
-            const CMPIObjectPath* path, const CMPIInstance*, const char** properties) {
-            return pass(mi, {.operation = "modifyInstance",
-                                .context = context,
-                                .result = result,
-                                .path = path,
-                                .properties = properties});
-        },
-    .deleteInstance =
-        [](CMPIInstanceMI* mi, const CMPIContext* context, const CMPIResult* result,
-            const CMPIObjectPath* path) {
-            return pass(mi, {"deleteInstance", context, result, path});
-        },
-    .execQuery = nullptr, // some providers leave out what they do not offer
+    .createInstance = nullptr, // what is left out is not supported
+    .modifyInstance = nullptr,
+    .deleteInstance = nullptr,
+    .execQuery = nullptr,
 };
 
 inline const CMPIAssociationMIFT ScriptedProvider::associationTable = {
@@ -150,30 +132,13 @@ inline const CMPIAssociationMIFT ScriptedProvider::associationTable = {
 
 using ScriptedProviders = std::map<std::string, ScriptedProvider>;
 
-// Finds them by the names of the registrations.
-class ScriptedSource : public Host::ProviderSource {
-public:
-    explicit ScriptedSource(ScriptedProviders& providers) : providers_(providers) {}
-
-    CMPIInstanceMI& instanceMI(const Host::ProviderRegistration& registration) override
-    {
-        return find(registration).instanceMI;
-    }
-    CMPIAssociationMI& associationMI(const Host::ProviderRegistration& registration) override
-    {
-        return find(registration).associationMI;
-    }
-
-private:
-    ScriptedProvider& find(const Host::ProviderRegistration& registration)
-    {
-        const auto found = providers_.find(registration.providerName);
-        if (found == providers_.end())
-            throw std::runtime_error("no provider " + registration.providerName);
-        return found->second;
-    }
-
-    ScriptedProviders& providers_;
-};
+// Registers the provider of that name, which is made if need be. The providers must outlive what
+// it is registered with.
+inline Host::ProviderRegistration registration(ScriptedProviders& providers,
+    const std::string& className, const std::string& name, bool servesAssociations = false)
+{
+    ScriptedProvider& provider = providers[name];
+    return {className, name, {}, servesAssociations, &provider.instanceMI, &provider.associationMI};
+}
 
 } // namespace Testing

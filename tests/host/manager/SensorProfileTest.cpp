@@ -4,7 +4,6 @@
 
 #include "host/manager/SensorProfile.h"
 
-#include "host/broker/CollectedResult.h"
 #include "host/broker/Instance.h"
 #include "host/broker/ObjectPath.h"
 #include "host/broker/Refusal.h"
@@ -17,6 +16,7 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
+#include <stdexcept>
 #include <thread>
 
 namespace SensorProfileTests {
@@ -36,10 +36,10 @@ protected:
     std::size_t count(Host::Manager& manager, const char* className)
     {
         Host::Request request(manager.broker());
-        Host::CollectedResult answer;
-        manager.enumerateInstances(
-            request.context(), request.makePath(nameSpace, className), nullptr, answer);
-        return answer.instances().size();
+        return manager
+            .enumerateInstances(request.context(), request.makePath(nameSpace, className), nullptr)
+            .instances()
+            .size();
     }
 
     Testing::TemporaryFolder folder_;
@@ -66,9 +66,8 @@ TEST_F(SensorProfileTest, everyObjectsOwnPathFindsIt)
     Host::Request request(manager.broker());
     for (const char* const className :
         {"CIM_ManagedElement", "CIM_Component", "CIM_ElementCapabilities"}) {
-        Host::CollectedResult answer;
-        manager.enumerateInstances(
-            request.context(), request.makePath(nameSpace, className), nullptr, answer);
+        const auto answer = manager.enumerateInstances(
+            request.context(), request.makePath(nameSpace, className), nullptr);
         for (const Host::Instance* const each : answer.instances()) {
             const Host::ObjectPath& path = each->objectPath();
             const Host::Instance& found = manager.getInstance(request.context(), path, nullptr);
@@ -81,17 +80,14 @@ TEST_F(SensorProfileTest, theSystemLeadsToItsSensorsAndBack)
 {
     Host::Manager manager(*classes_, Host::sensorProfileProviders(sensorLibrary, systemLibrary));
     Host::Request request(manager.broker());
-    Host::CollectedResult systems;
-    manager.enumerateInstanceNames(
-        request.context(), request.makePath(nameSpace, "CIM_ComputerSystem"), systems);
+    const auto systems = manager.enumerateInstanceNames(
+        request.context(), request.makePath(nameSpace, "CIM_ComputerSystem"));
     ASSERT_EQ(systems.paths().size(), 1U);
-    Host::CollectedResult sensors;
-    manager.associatorNames(request.context(), *systems.paths()[0],
-        {.associationClass = "CIM_SystemDevice", .resultRole = "PartComponent"}, sensors);
+    const auto sensors = manager.associatorNames(request.context(), *systems.paths()[0],
+        {.associationClass = "CIM_SystemDevice", .resultRole = "PartComponent"});
     ASSERT_EQ(sensors.paths().size(), 2U);
-    Host::CollectedResult back;
-    manager.associatorNames(
-        request.context(), *sensors.paths()[0], {.resultClass = "CIM_System"}, back);
+    const auto back = manager.associatorNames(
+        request.context(), *sensors.paths()[0], {.resultClass = "CIM_System"});
     ASSERT_EQ(back.paths().size(), 1U);
     EXPECT_EQ(back.paths()[0]->className(), "ZUMLO_ComputerSystem");
 }
@@ -105,15 +101,12 @@ TEST_F(SensorProfileTest, withoutTheCompanionSensorsAreStillServed)
 
 TEST_F(SensorProfileTest, aMissingLibraryIsAFailureThatNamesIt)
 {
-    Host::Manager manager(
-        *classes_, Host::sensorProfileProviders(sensorLibrary, "/no/such/library.so"));
-    EXPECT_EQ(count(manager, "ZUMLO_NumericSensor"), 2U);
     try {
-        count(manager, "ZUMLO_ComputerSystem");
+        const Host::Manager manager(
+            *classes_, Host::sensorProfileProviders(sensorLibrary, "/no/such/library.so"));
         FAIL() << "no failure";
-    } catch (const Host::Refusal& refusal) {
-        EXPECT_EQ(refusal.code(), CMPI_RC_ERR_FAILED);
-        EXPECT_THAT(refusal.what(), HasSubstr("/no/such/library.so"));
+    } catch (const std::runtime_error& failure) {
+        EXPECT_THAT(failure.what(), HasSubstr("/no/such/library.so"));
     }
 }
 

@@ -48,7 +48,7 @@ void enumerate(std::size_t& count)
     Host::Broker broker;
     Host::ProviderLibrary library(broker, provider);
     Host::Request request(broker);
-    CMPIInstanceMI& mi = library.instanceMI("SensorProfileProvider");
+    CMPIInstanceMI& mi = library.createInstanceMI("SensorProfileProvider");
     Host::CollectedResult answer;
     Host::Result result(answer);
     const CMPIStatus status = mi.ft->enumerateInstances(&mi, request.context().handle(),

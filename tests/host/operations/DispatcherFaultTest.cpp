@@ -117,15 +117,6 @@ TEST_F(DispatcherFaultTest, anElementThatLacksSomethingIsNoAnswer)
     EXPECT_EQ(errorOf("EnumerateInstances", ofThing_), "");
 }
 
-TEST_F(DispatcherFaultTest, aLibraryThatIsMissingIsAFailureThatNamesIt)
-{
-    const auto classes = Testing::compile(CimXmlTests::Classes);
-    Host::ObjectManager manager(
-        *classes, {{"Thing", "Things", "/no/such/library.so"}}, [] { return std::string("host"); });
-    EXPECT_THAT(errorIn(answerTo(manager, call("EnumerateInstances", ofThing_))),
-        StartsWith("1: /no/such/library.so: "));
-}
-
 } // namespace
 
 } // namespace OperationTests

@@ -26,10 +26,8 @@ protected:
     // The names of the properties of the one profile.
     std::vector<std::string> profile(const char** properties)
     {
-        Host::CollectedResult answer;
-        manager_.enumerateInstances(request_.context(),
-            request_.makePath(Host::interopNameSpace, Host::registeredProfileClass), properties,
-            answer);
+        const auto answer = manager_.enumerateInstances(request_.context(),
+            request_.makePath(Host::interopNameSpace, Host::registeredProfileClass), properties);
         EXPECT_EQ(answer.instances().size(), 1U);
         std::vector<std::string> names;
         for (const Host::NamedValue& property : answer.instances().at(0)->properties())
@@ -58,10 +56,7 @@ protected:
     const std::unique_ptr<const Host::Repository> classes_ = Testing::shippedClasses();
     std::string hostName_ = "host.example";
     Host::InteropProvider interop_{*classes_, [this] { return hostName_; }};
-    Host::Manager manager_{
-        *classes_, Host::InteropProvider::registrations(), [this](const Host::Broker& broker) {
-            return std::make_unique<Host::ProvidersWithInterop>(broker, interop_);
-        }};
+    Host::Manager manager_{*classes_, interop_.registrations()};
     Host::Request request_{manager_.broker()};
 };
 
@@ -92,9 +87,8 @@ TEST_F(InteropProviderTest, anObjectIsFoundByAllItsKeys)
 
 TEST_F(InteropProviderTest, thereIsOneNamespaceObjectForEachNamespace)
 {
-    Host::CollectedResult answer;
-    manager_.enumerateInstanceNames(request_.context(),
-        request_.makePath(Host::interopNameSpace, Host::namespaceClass), answer);
+    const auto answer = manager_.enumerateInstanceNames(
+        request_.context(), request_.makePath(Host::interopNameSpace, Host::namespaceClass));
     std::vector<std::string> names;
     for (const Host::ObjectPath* const path : answer.paths())
         names.emplace_back(*path->key("Name")->text());
@@ -104,9 +98,8 @@ TEST_F(InteropProviderTest, thereIsOneNamespaceObjectForEachNamespace)
 TEST_F(InteropProviderTest, theSystemIsNamedAsItIsNow)
 {
     const auto systemName = [&](const char* className) {
-        Host::CollectedResult answer;
-        manager_.enumerateInstances(request_.context(),
-            request_.makePath(Host::interopNameSpace, className), nullptr, answer);
+        const auto answer = manager_.enumerateInstances(
+            request_.context(), request_.makePath(Host::interopNameSpace, className), nullptr);
         return std::string(*answer.instances().at(0)->property("SystemName")->text());
     };
     EXPECT_EQ(systemName(Host::objectManagerClass), "host.example");
@@ -117,9 +110,8 @@ TEST_F(InteropProviderTest, theSystemIsNamedAsItIsNow)
 
 TEST_F(InteropProviderTest, everyPropertyIsDeclaredWithItsType)
 {
-    Host::CollectedResult answer;
-    manager_.enumerateInstances(request_.context(),
-        request_.makePath(Host::interopNameSpace, "CIM_ManagedElement"), nullptr, answer);
+    const auto answer = manager_.enumerateInstances(request_.context(),
+        request_.makePath(Host::interopNameSpace, "CIM_ManagedElement"), nullptr);
     EXPECT_EQ(answer.instances().size(), 4U);
     for (const Host::Instance* const instance : answer.instances()) {
         const auto* const declared =

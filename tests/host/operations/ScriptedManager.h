@@ -88,10 +88,10 @@ private:
     std::chrono::steady_clock::time_point now_;
     std::string hostName_ = "host.example";
     Testing::ScriptedProviders providers_;
-    Host::Manager manager_{classes(),
-        {{"Thing", "Things", {}}, {"Gauge", "Gauges", {}}, {"Link", "Links", {}, true, true}},
-        [this](
-            const Host::Broker&) { return std::make_unique<Testing::ScriptedSource>(providers_); }};
+    Host::Manager manager_{
+        classes(), {Testing::registration(providers_, "Thing", "Things"),
+                       Testing::registration(providers_, "Gauge", "Gauges"),
+                       Testing::registration(providers_, "Link", "Links", true)}};
     Host::Dispatcher dispatcher_;
 };
 

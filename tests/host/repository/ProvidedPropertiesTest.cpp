@@ -36,9 +36,8 @@ TEST_P(ProvidedPropertiesTest, areDeclaredWithTheTypeTheyHave)
 {
     const Host::ClassDeclaration& declared = *repository_->findClass(Cimv2, GetParam());
     Host::Request request(manager_.broker());
-    Host::CollectedResult answer;
-    manager_.enumerateInstances(
-        request.context(), request.makePath(Cimv2, GetParam()), nullptr, answer);
+    const auto answer = manager_.enumerateInstances(
+        request.context(), request.makePath(Cimv2, GetParam()), nullptr);
     ASSERT_FALSE(answer.instances().empty());
     for (const Host::Instance* const instance : answer.instances()) {
         ASSERT_NE(instance->properties().size(), 0U);
@@ -56,8 +55,7 @@ TEST_P(ProvidedPropertiesTest, areDeclaredWithTheTypeTheyHave)
 TEST_P(ProvidedPropertiesTest, keysOfPathsAreThoseOfTheClass)
 {
     Host::Request request(manager_.broker());
-    Host::CollectedResult answer;
-    manager_.enumerateInstanceNames(request.context(), request.makePath(Cimv2, GetParam()), answer);
+    const auto answer = manager_.enumerateInstanceNames(request.context(), request.makePath(Cimv2, GetParam()));
     ASSERT_FALSE(answer.paths().empty());
     for (const Host::ObjectPath* const path : answer.paths()) {
         std::vector<std::string> keys;
