@@ -46,15 +46,15 @@ private:
     Host::Result result_{answer};
 };
 
-class ComputerSystemFaultSweep : public ::testing::TestWithParam<Operation> {
+class ComputerSystemFaultSweepTest : public ::testing::TestWithParam<Operation> {
 protected:
     Host::Broker broker_;
 };
 
-INSTANTIATE_TEST_SUITE_P(EveryRequest, ComputerSystemFaultSweep,
+INSTANTIATE_TEST_SUITE_P(EveryRequest, ComputerSystemFaultSweepTest,
     ::testing::Values(Operation::names, Operation::instances, Operation::oneInstance));
 
-TEST_P(ComputerSystemFaultSweep, isSurvivedAndAnswersWithNothingMadeUp)
+TEST_P(ComputerSystemFaultSweepTest, IsSurvivedAndAnswersWithNothingMadeUp)
 {
     Testing::sweepFaults(broker_, [&](FaultyBroker& faulty) {
         const FaultyRequest request(broker_, faulty, GetParam());
@@ -73,7 +73,7 @@ struct Refusal {
     unsigned nth;
 };
 
-TEST(ComputerSystemFaultTest, withoutItsKeysNothingIsDelivered)
+TEST(ComputerSystemFaultTest, WithoutItsKeysNothingIsDelivered)
 {
     const Host::Broker broker;
     for (const Refusal& refusal : {Refusal{Operation::names, BrokerCall::addKey, 1},
@@ -89,7 +89,7 @@ TEST(ComputerSystemFaultTest, withoutItsKeysNothingIsDelivered)
     }
 }
 
-TEST(ComputerSystemFaultTest, aResultThatRefusesItsDeliveryIsNotClaimedToBeDelivered)
+TEST(ComputerSystemFaultTest, AResultThatRefusesItsDeliveryIsNotClaimedToBeDelivered)
 {
     const Host::Broker broker;
     for (const Refusal& refusal : {Refusal{Operation::names, BrokerCall::returnObjectPath, 1},
@@ -104,7 +104,7 @@ TEST(ComputerSystemFaultTest, aResultThatRefusesItsDeliveryIsNotClaimedToBeDeliv
     }
 }
 
-TEST(ComputerSystemFaultTest, aFailureWhoseMessageCannotBeMadeHasNone)
+TEST(ComputerSystemFaultTest, AFailureWhoseMessageCannotBeMadeHasNone)
 {
     const Host::Broker broker;
     for (const FaultManner manner : {FaultManner::nullResult, FaultManner::handleless}) {
@@ -117,7 +117,7 @@ TEST(ComputerSystemFaultTest, aFailureWhoseMessageCannotBeMadeHasNone)
     }
 }
 
-TEST(ComputerSystemFaultTest, anArrayThatCannotBeMadeLeavesItsPropertyOut)
+TEST(ComputerSystemFaultTest, AnArrayThatCannotBeMadeLeavesItsPropertyOut)
 {
     const Host::Broker broker;
     FaultyBroker faulty(broker);

@@ -27,13 +27,13 @@ bool isLoaded()
     return handle != nullptr;
 }
 
-TEST(ComputerSystemLibrary, exportsItsFactoryAndNothingElse)
+TEST(ComputerSystemLibraryTest, ExportsItsFactoryAndNothingElse)
 {
     EXPECT_THAT(Testing::exportedNames(library),
         testing::ElementsAre("ComputerSystemProvider_Create_InstanceMI"));
 }
 
-TEST(ComputerSystemLibrary, isUsedAndUnloadedOverAndOver)
+TEST(ComputerSystemLibraryTest, IsUsedAndUnloadedOverAndOver)
 {
     for (int use = 0; use < 20; ++use) {
         Host::Broker broker;

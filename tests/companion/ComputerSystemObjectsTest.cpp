@@ -29,7 +29,7 @@ protected:
     }
 };
 
-TEST_F(ComputerSystemObjectsTest, anInstanceHasEveryProperty)
+TEST_F(ComputerSystemObjectsTest, AnInstanceHasEveryProperty)
 {
     EXPECT_THAT(describe(instance({"box", "some-hash"}).properties()),
         ElementsAre("CreationClassName = string \"ZUMLO_ComputerSystem\"", "Name = string \"box\"",
@@ -42,7 +42,7 @@ TEST_F(ComputerSystemObjectsTest, anInstanceHasEveryProperty)
             "HealthState = uint16 5", "OperationalStatus = [uint16 2]"));
 }
 
-TEST_F(ComputerSystemObjectsTest, aMachineWithoutIdentifierHasNoIdentifyingInfo)
+TEST_F(ComputerSystemObjectsTest, AMachineWithoutIdentifierHasNoIdentifyingInfo)
 {
     const Host::Instance& made = instance({"box", std::nullopt});
     EXPECT_EQ(made.property("OtherIdentifyingInfo"), nullptr);
@@ -50,21 +50,21 @@ TEST_F(ComputerSystemObjectsTest, aMachineWithoutIdentifierHasNoIdentifyingInfo)
     EXPECT_EQ(made.properties().size(), 11U);
 }
 
-TEST_F(ComputerSystemObjectsTest, aPropertyListLeavesTheKeysAndWhatItNames)
+TEST_F(ComputerSystemObjectsTest, APropertyListLeavesTheKeysAndWhatItNames)
 {
     const char* properties[] = {"healthstate", "Unheard", nullptr};
     EXPECT_THAT(Testing::namesOf(instance({"box", "id"}, properties).properties()),
         ElementsAre("CreationClassName", "Name", "HealthState"));
 }
 
-TEST_F(ComputerSystemObjectsTest, anEmptyPropertyListLeavesTheKeys)
+TEST_F(ComputerSystemObjectsTest, AnEmptyPropertyListLeavesTheKeys)
 {
     const char* properties[] = {nullptr};
     EXPECT_THAT(Testing::namesOf(instance({"box", "id"}, properties).properties()),
         ElementsAre("CreationClassName", "Name"));
 }
 
-TEST_F(ComputerSystemObjectsTest, thePathHasTheRequestsNamespaceAndTheComputerAsHost)
+TEST_F(ComputerSystemObjectsTest, ThePathHasTheRequestsNamespaceAndTheComputerAsHost)
 {
     const CMPIObjectPath* const made = Vorn::Companion::makePath(
         broker(), path(Class, {}, "root/other").handle(), {"box", std::nullopt});
@@ -73,7 +73,7 @@ TEST_F(ComputerSystemObjectsTest, thePathHasTheRequestsNamespaceAndTheComputerAs
         "Name=\"box\"");
 }
 
-TEST_F(ComputerSystemObjectsTest, theComputerHasTheSystemNameOfItsSensors)
+TEST_F(ComputerSystemObjectsTest, TheComputerHasTheSystemNameOfItsSensors)
 {
     EXPECT_EQ(Vorn::Companion::thisComputerSystem().name, systemName_);
 }

@@ -46,7 +46,7 @@ protected:
     CMPIInstanceMI* mi_;
 };
 
-TEST_F(ComputerSystemProviderTest, thereIsOneNameInTheRequestsNamespace)
+TEST_F(ComputerSystemProviderTest, ThereIsOneNameInTheRequestsNamespace)
 {
     const CMPIStatus status = mi_->ft->enumerateInstanceNames(
         mi_, context(), result(), path(Class, {}, "root/other").handle());
@@ -58,7 +58,7 @@ TEST_F(ComputerSystemProviderTest, thereIsOneNameInTheRequestsNamespace)
     EXPECT_TRUE(answer_.isDone());
 }
 
-TEST_F(ComputerSystemProviderTest, thereIsOneInstance)
+TEST_F(ComputerSystemProviderTest, ThereIsOneInstance)
 {
     expectFound(
         mi_->ft->enumerateInstances(mi_, context(), result(), path(Class).handle(), nullptr));
@@ -66,7 +66,7 @@ TEST_F(ComputerSystemProviderTest, thereIsOneInstance)
         path(Class, keys()).toText().insert(0, "//" + systemName_ + "/"));
 }
 
-TEST_F(ComputerSystemProviderTest, theListedPropertiesAndTheKeysAreReturned)
+TEST_F(ComputerSystemProviderTest, TheListedPropertiesAndTheKeysAreReturned)
 {
     const char* properties[] = {"Dedicated", nullptr};
     expectFound(get(path(Class, keys()), properties));
@@ -74,39 +74,39 @@ TEST_F(ComputerSystemProviderTest, theListedPropertiesAndTheKeysAreReturned)
         ::testing::ElementsAre("CreationClassName", "Name", "Dedicated"));
 }
 
-TEST_F(ComputerSystemProviderTest, itsKeysFindIt)
+TEST_F(ComputerSystemProviderTest, ItsKeysFindIt)
 {
     expectFound(get(path(Class, keys())));
 }
 
-TEST_F(ComputerSystemProviderTest, lettersOfClassAndKeyNamesMayBeOfEitherCase)
+TEST_F(ComputerSystemProviderTest, LettersOfClassAndKeyNamesMayBeOfEitherCase)
 {
     expectFound(
         get(path("zumlo_computersystem", {{"NAME", systemName_}, {"creationclassname", Class}})));
 }
 
-TEST_F(ComputerSystemProviderTest, keysThatAClientLeftOutAreNotThere)
+TEST_F(ComputerSystemProviderTest, KeysThatAClientLeftOutAreNotThere)
 {
     Host::ObjectPath& ref = path(Class, {{"Name", systemName_}});
     ref.addKey("CreationClassName", Host::Value::absent());
     expectNotFound(get(ref));
 }
 
-TEST_F(ComputerSystemProviderTest, anExtraKeyWithoutValueDoesNotMatter)
+TEST_F(ComputerSystemProviderTest, AnExtraKeyWithoutValueDoesNotMatter)
 {
     Host::ObjectPath& ref = path(Class, keys());
     ref.addKey("Other", Host::Value::absent());
     expectFound(get(ref));
 }
 
-TEST_F(ComputerSystemProviderTest, theHostOfARequestDoesNotMatter)
+TEST_F(ComputerSystemProviderTest, TheHostOfARequestDoesNotMatter)
 {
     Host::ObjectPath& ref = path(Class, keys());
     ref.setHost(nullptr);
     expectFound(get(ref));
 }
 
-TEST_F(ComputerSystemProviderTest, otherKeysFindNothing)
+TEST_F(ComputerSystemProviderTest, OtherKeysFindNothing)
 {
     expectNotFound(get(path(Class)));
     expectNotFound(get(path(Class, {{"CreationClassName", Class}, {"Name", "elsewhere"}})));
@@ -117,7 +117,7 @@ TEST_F(ComputerSystemProviderTest, otherKeysFindNothing)
     expectNotFound(get(number));
 }
 
-TEST_F(ComputerSystemProviderTest, withoutANamespaceNothingCanBeMade)
+TEST_F(ComputerSystemProviderTest, WithoutANamespaceNothingCanBeMade)
 {
     Host::ObjectPath& ref = path(Class);
     ref.setNameSpace(nullptr);
@@ -127,7 +127,7 @@ TEST_F(ComputerSystemProviderTest, withoutANamespaceNothingCanBeMade)
     EXPECT_EQ(Testing::textOf(status.msg), "the object path cannot be made");
 }
 
-TEST_F(ComputerSystemProviderTest, writingAndQueryingAreNotSupported)
+TEST_F(ComputerSystemProviderTest, WritingAndQueryingAreNotSupported)
 {
     const auto expectNotSupported = [](const CMPIStatus& status) {
         EXPECT_EQ(status.rc, CMPI_RC_ERR_NOT_SUPPORTED);
@@ -140,7 +140,7 @@ TEST_F(ComputerSystemProviderTest, writingAndQueryingAreNotSupported)
     EXPECT_EQ(mi_->ft->cleanup(mi_, nullptr, 0).rc, CMPI_RC_OK);
 }
 
-TEST_F(ComputerSystemProviderTest, theFactoryReturnsTheSameRecordAtEveryCall)
+TEST_F(ComputerSystemProviderTest, TheFactoryReturnsTheSameRecordAtEveryCall)
 {
     const Host::Broker other;
     EXPECT_EQ(ComputerSystemProvider_Create_InstanceMI(other.handle(), nullptr, nullptr), mi_);
@@ -148,7 +148,7 @@ TEST_F(ComputerSystemProviderTest, theFactoryReturnsTheSameRecordAtEveryCall)
     EXPECT_STREQ(mi_->ft->miName, "instanceComputerSystemProvider");
 }
 
-TEST_F(ComputerSystemProviderTest, theFactoryRefusesToWorkWithoutABroker)
+TEST_F(ComputerSystemProviderTest, TheFactoryRefusesToWorkWithoutABroker)
 {
     CMPIStatus status{};
     EXPECT_EQ(ComputerSystemProvider_Create_InstanceMI(nullptr, nullptr, &status), nullptr);

@@ -10,12 +10,12 @@ namespace {
 
 using Vorn::ProviderException;
 
-TEST(ProviderException, anEmptyMessageGivesAnEmptyText)
+TEST(ProviderExceptionTest, AnEmptyMessageGivesAnEmptyText)
 {
     EXPECT_STREQ(ProviderException("").what(), "");
 }
 
-TEST(ProviderException, aCopyKeepsItsTextWhenTheSourceIsGone)
+TEST(ProviderExceptionTest, ACopyKeepsItsTextWhenTheSourceIsGone)
 {
     auto source = std::make_unique<ProviderException>("Failed while setting Device ID");
     const ProviderException copy(*source);
@@ -23,7 +23,7 @@ TEST(ProviderException, aCopyKeepsItsTextWhenTheSourceIsGone)
     EXPECT_STREQ(copy.what(), "Failed while setting Device ID");
 }
 
-TEST(ProviderException, keepsItsTextWhenTheCharactersItWasMadeFromAreOverwritten)
+TEST(ProviderExceptionTest, KeepsItsTextWhenTheCharactersItWasMadeFromAreOverwritten)
 {
     char text[] = "Failed while setting Device ID";
     const ProviderException exception(text);
@@ -31,14 +31,14 @@ TEST(ProviderException, keepsItsTextWhenTheCharactersItWasMadeFromAreOverwritten
     EXPECT_STREQ(exception.what(), "Failed while setting Device ID");
 }
 
-TEST(ProviderException, theBaseClassesWhatGivesTheMessage)
+TEST(ProviderExceptionTest, TheBaseClassesWhatGivesTheMessage)
 {
     const ProviderException exception("Failed while setting Health State");
     const std::exception& base = exception;
     EXPECT_STREQ(base.what(), "Failed while setting Health State");
 }
 
-TEST(ProviderException, aLongMessageIsKeptWhole)
+TEST(ProviderExceptionTest, ALongMessageIsKeptWhole)
 {
     const std::string text(10000, 'x');
     EXPECT_EQ(ProviderException(text.c_str()).what(), text);

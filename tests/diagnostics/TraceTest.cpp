@@ -19,7 +19,7 @@ using Testing::LogLine;
 const std::string Component = "Nimbrel.Test";
 const std::string Separator(78, '=');
 
-TEST(Trace, eachTypeHasItsFormat)
+TEST(TraceTest, EachTypeHasItsFormat)
 {
     EXPECT_STREQ(trace("Sensor_GetInstance", "f", 120, Exiting),
         "EXITING: Sensor_GetInstance() in f [Line: 120]");
@@ -29,7 +29,7 @@ TEST(Trace, eachTypeHasItsFormat)
     EXPECT_STREQ(trace("t", "f", 7, Message), "MESSAGE [File: f, Line: 7]: t");
 }
 
-TEST(Trace, theNumbersOfTheTypesAreFixed)
+TEST(TraceTest, TheNumbersOfTheTypesAreFixed)
 {
     EXPECT_EQ(Entering, 0);
     EXPECT_EQ(Exiting, 1);
@@ -37,13 +37,13 @@ TEST(Trace, theNumbersOfTheTypesAreFixed)
     EXPECT_EQ(Message, 3);
 }
 
-TEST(Trace, anyOtherTypeIsAnEnteringLine)
+TEST(TraceTest, AnyOtherTypeIsAnEnteringLine)
 {
     EXPECT_STREQ(trace("f", "F", 1, static_cast<MessageType>(9)), "ENTERING: f() in F [Line: 1]");
     EXPECT_STREQ(trace("f", "F", 1, static_cast<MessageType>(-1)), "ENTERING: f() in F [Line: 1]");
 }
 
-TEST(Trace, aParameterListFollowsEachFormat)
+TEST(TraceTest, AParameterListFollowsEachFormat)
 {
     EXPECT_STREQ(tracepara("getAllSensorCMPIInstances", "f", 162, " broker=0x1", Entering),
         "ENTERING: getAllSensorCMPIInstances() in f [Line: 162],Parameters List:  broker=0x1");
@@ -59,7 +59,7 @@ TEST(Trace, aParameterListFollowsEachFormat)
         "ENTERING: g() in f [Line: 1],Parameters List: (null)");
 }
 
-TEST(Trace, aLongLineIsCutAndTheRestOfAShorterOneIsCleared)
+TEST(TraceTest, ALongLineIsCutAndTheRestOfAShorterOneIsCleared)
 {
     const std::string longText(2000, 'x');
     char* const line = trace(longText.c_str(), "f", 1, Message);
@@ -72,7 +72,7 @@ TEST(Trace, aLongLineIsCutAndTheRestOfAShorterOneIsCleared)
     EXPECT_EQ(std::string(parameters).size(), 511U);
 }
 
-TEST(Trace, linesWithAndWithoutParametersHaveABufferEach)
+TEST(TraceTest, LinesWithAndWithoutParametersHaveABufferEach)
 {
     const char* const plain = trace("a", "f", 1, Entering);
     const char* const withParameters = tracepara("b", "f", 1, "", Entering);
@@ -80,14 +80,14 @@ TEST(Trace, linesWithAndWithoutParametersHaveABufferEach)
     EXPECT_STREQ(plain, "ENTERING: a() in f [Line: 1]");
 }
 
-TEST(Trace, eachThreadHasBuffersOfItsOwn)
+TEST(TraceTest, EachThreadHasBuffersOfItsOwn)
 {
     const char* const mine = trace("a", "f", 1, Entering);
     std::thread([&] { EXPECT_NE(trace("b", "f", 1, Entering), mine); }).join();
     EXPECT_STREQ(mine, "ENTERING: a() in f [Line: 1]");
 }
 
-TEST(Marks, theEntryMarkIsASeparatorAndAnEnteringLine)
+TEST(MarksTest, TheEntryMarkIsASeparatorAndAnEnteringLine)
 {
     const LogCapture capture;
     markProviderEntry(Component, "Sensor_GetInstance", "SensorProvider", 192);
@@ -98,7 +98,7 @@ TEST(Marks, theEntryMarkIsASeparatorAndAnEnteringLine)
     EXPECT_EQ(capture.log(), expected);
 }
 
-TEST(Marks, theExitMarkIsAnExitingLineAndASeparator)
+TEST(MarksTest, TheExitMarkIsAnExitingLineAndASeparator)
 {
     const LogCapture capture;
     markProviderExit(Component, "Sensor_GetInstance", "SensorProvider", 293);
@@ -109,7 +109,7 @@ TEST(Marks, theExitMarkIsAnExitingLineAndASeparator)
     EXPECT_EQ(capture.log(), expected);
 }
 
-TEST(Marks, theTraceChannelReceivesTheSameLinesAsTheLogChannel)
+TEST(MarksTest, TheTraceChannelReceivesTheSameLinesAsTheLogChannel)
 {
     const LogCapture capture;
     markProviderEntry(Component, "f", "F", 1);
@@ -122,7 +122,7 @@ TEST(Marks, theTraceChannelReceivesTheSameLinesAsTheLogChannel)
     EXPECT_EQ(capture.trace(), expected);
 }
 
-TEST(Marks, theLogChannelReceivesALineBeforeTheTraceChannel)
+TEST(MarksTest, TheLogChannelReceivesALineBeforeTheTraceChannel)
 {
     const Testing::TemporaryFolder folder;
     const std::filesystem::path both = folder.path() / "both";
@@ -136,7 +136,7 @@ TEST(Marks, theLogChannelReceivesALineBeforeTheTraceChannel)
     EXPECT_EQ(channels, (std::vector<std::string>{"log", "trace"}));
 }
 
-TEST(TracedOperation, marksCarryTheParameterListAtLevel3000)
+TEST(TracedOperationTest, MarksCarryTheParameterListAtLevel3000)
 {
     const LogCapture capture;
     const int* const nothing = nullptr;
@@ -152,7 +152,7 @@ TEST(TracedOperation, marksCarryTheParameterListAtLevel3000)
     EXPECT_EQ(capture.log(), expected);
 }
 
-TEST(TracedOperation, plainMarksHaveLevel4000)
+TEST(TracedOperationTest, PlainMarksHaveLevel4000)
 {
     const LogCapture capture;
     const TracedOperation traced({Component, "F"}, "f");
@@ -164,7 +164,7 @@ TEST(TracedOperation, plainMarksHaveLevel4000)
     EXPECT_EQ(capture.log(), expected);
 }
 
-TEST(TracedOperation, aMarkWithoutALineNumberCarriesItsSourceLine)
+TEST(TracedOperationTest, AMarkWithoutALineNumberCarriesItsSourceLine)
 {
     const LogCapture capture;
     const TracedOperation traced({Component, "F"}, "f");
@@ -174,7 +174,7 @@ TEST(TracedOperation, aMarkWithoutALineNumberCarriesItsSourceLine)
     EXPECT_EQ(capture.log().front().line, here);
 }
 
-TEST(TracedOperation, aFailureIsAMessageLineAtLevel6000)
+TEST(TracedOperationTest, AFailureIsAMessageLineAtLevel6000)
 {
     const LogCapture capture;
     traceMessage({Component, "F"}, "f", 94, "getAllSensorCMPIObjPaths failed");
@@ -183,7 +183,7 @@ TEST(TracedOperation, aFailureIsAMessageLineAtLevel6000)
     EXPECT_EQ(capture.log(), expected);
 }
 
-TEST(TracedOperation, aParameterListIsNotComposedWhenNobodyWantsIt)
+TEST(TracedOperationTest, AParameterListIsNotComposedWhenNobodyWantsIt)
 {
     const LogCapture capture(6000);
     bool composed = false;

@@ -82,14 +82,14 @@ INSTANTIATE_TEST_SUITE_P(All, AssociationRowTest, ValuesIn(Rows),
 
 // ---- The four ends ----
 
-TEST_P(AssociationRowTest, namesTheTargetAndTellsTheBroker)
+TEST_P(AssociationRowTest, NamesTheTargetAndTellsTheBroker)
 {
     EXPECT_STREQ(nameFrom(GetParam().source, GetParam().association), GetParam().target);
     EXPECT_EQ(rc_.rc, CMPI_RC_OK);
     EXPECT_THAT(messages_, ElementsAre(message()));
 }
 
-TEST_P(AssociationRowTest, makesAKeylessPathInTheSourcesNamespaceOnThisSystem)
+TEST_P(AssociationRowTest, MakesAKeylessPathInTheSourcesNamespaceOnThisSystem)
 {
     const Host::ObjectPath* const target = pathFrom(GetParam().source, GetParam().association);
     ASSERT_NE(target, nullptr);
@@ -101,7 +101,7 @@ TEST_P(AssociationRowTest, makesAKeylessPathInTheSourcesNamespaceOnThisSystem)
     EXPECT_THAT(messages_, ElementsAre(message()));
 }
 
-TEST_P(AssociationRowTest, doesNotLookAtTheResultClass)
+TEST_P(AssociationRowTest, DoesNotLookAtTheResultClass)
 {
     for (const char* const resultClass : {"", "CIM_ComputerSystem", Sensor, "NOT_AClass"}) {
         EXPECT_STREQ(
@@ -110,7 +110,7 @@ TEST_P(AssociationRowTest, doesNotLookAtTheResultClass)
     }
 }
 
-TEST_P(AssociationRowTest, comparesLetterForLetter)
+TEST_P(AssociationRowTest, ComparesLetterForLetter)
 {
     const auto lower = [](std::string name) {
         for (char& letter : name)
@@ -124,7 +124,7 @@ TEST_P(AssociationRowTest, comparesLetterForLetter)
     expectNoTarget(row.source, (row.association + std::string(" ")).c_str());
 }
 
-TEST_P(AssociationRowTest, withoutAnAssociationClassHasNoTarget)
+TEST_P(AssociationRowTest, WithoutAnAssociationClassHasNoTarget)
 {
     expectNoTarget(GetParam().source, nullptr);
     expectNoTarget(GetParam().source, "");
@@ -138,7 +138,7 @@ std::string traced(
            "() in SensorFactory [Line: " + number + "],Parameters List:  " + parameters;
 }
 
-TEST_P(AssociationRowTest, isTracedWithItsParameters)
+TEST_P(AssociationRowTest, IsTracedWithItsParameters)
 {
     const LogCapture capture;
     pathFrom(GetParam().source, GetParam().association, "Result");
@@ -153,7 +153,7 @@ TEST_P(AssociationRowTest, isTracedWithItsParameters)
             traced(objectPath, "EXITING", 1316, parameters)));
 }
 
-TEST_P(AssociationRowTest, aPathTheBrokerDoesNotMakeIsNoTarget)
+TEST_P(AssociationRowTest, APathTheBrokerDoesNotMakeIsNoTarget)
 {
     for (const FaultManner manner : {FaultManner::nullResult, FaultManner::handleless}) {
         const LogCapture capture;
@@ -171,7 +171,7 @@ TEST_P(AssociationRowTest, aPathTheBrokerDoesNotMakeIsNoTarget)
 
 // ---- What is no end ----
 
-TEST_F(AssociationTargetTest, anotherProvidersEndHasNoTarget)
+TEST_F(AssociationTargetTest, AnotherProvidersEndHasNoTarget)
 {
     expectNoTarget(System, ElementCapabilities);
     expectNoTarget(Capabilities, SystemDevice);
@@ -184,7 +184,7 @@ TEST_F(AssociationTargetTest, anotherProvidersEndHasNoTarget)
     expectNoTarget("OTHER_Class", ElementCapabilities);
 }
 
-TEST_F(AssociationTargetTest, noTargetLeavesTheTextOfTheStatusToTheCaller)
+TEST_F(AssociationTargetTest, NoTargetLeavesTheTextOfTheStatusToTheCaller)
 {
     // The broker's calls on the way succeed and say so; nothing else is written.
     CMPIStatus* const none = nullptr;
@@ -196,7 +196,7 @@ TEST_F(AssociationTargetTest, noTargetLeavesTheTextOfTheStatusToTheCaller)
         Sensor);
 }
 
-TEST_F(AssociationTargetTest, aSourceThatIsNoPathHasNoTarget)
+TEST_F(AssociationTargetTest, ASourceThatIsNoPathHasNoTarget)
 {
     const CMPIObjectPath handleless = {nullptr, &Host::ObjectPath::functions};
     for (const CMPIObjectPath* const source :
@@ -211,7 +211,7 @@ TEST_F(AssociationTargetTest, aSourceThatIsNoPathHasNoTarget)
     EXPECT_TRUE(messages_.empty());
 }
 
-TEST_F(AssociationTargetTest, aSourceWhoseClassIsNotToldHasNoTarget)
+TEST_F(AssociationTargetTest, ASourceWhoseClassIsNotToldHasNoTarget)
 {
     for (const FaultManner manner : {FaultManner::nullResult, FaultManner::handleless}) {
         FaultyBroker faulty(broker_);
@@ -223,7 +223,7 @@ TEST_F(AssociationTargetTest, aSourceWhoseClassIsNotToldHasNoTarget)
     }
 }
 
-TEST_F(AssociationTargetTest, aSourceWhoseNamespaceIsNotToldHasNoTargetPath)
+TEST_F(AssociationTargetTest, ASourceWhoseNamespaceIsNotToldHasNoTargetPath)
 {
     FaultyBroker faulty(broker_);
     faulty.plan({BrokerCall::getNameSpace, 1, FaultManner::nullResult});
@@ -233,7 +233,7 @@ TEST_F(AssociationTargetTest, aSourceWhoseNamespaceIsNotToldHasNoTargetPath)
     EXPECT_EQ(rc_.rc, CMPI_RC_ERR_FAILED);
 }
 
-TEST_F(AssociationTargetTest, noTargetIsTracedWithItsOwnExitingLineAndAbsentNames)
+TEST_F(AssociationTargetTest, NoTargetIsTracedWithItsOwnExitingLineAndAbsentNames)
 {
     const LogCapture capture;
     pathFrom("OTHER_Class", nullptr);
@@ -249,7 +249,7 @@ TEST_F(AssociationTargetTest, noTargetIsTracedWithItsOwnExitingLineAndAbsentName
 
 // ---- Names ----
 
-TEST(ClassNames, areTheOnesOfTheSchema)
+TEST(ClassNamesTest, AreTheOnesOfTheSchema)
 {
     using namespace Vorn::SensorProfileProvider;
     EXPECT_STREQ(SensorClass, Sensor);

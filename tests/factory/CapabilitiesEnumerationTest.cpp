@@ -58,7 +58,7 @@ protected:
 
 // ---- Instances ----
 
-TEST_F(CapabilitiesEnumerationTest, thereIsOneInstance)
+TEST_F(CapabilitiesEnumerationTest, ThereIsOneInstance)
 {
     EXPECT_EQ(getAll(), 0);
     ASSERT_EQ(instances_.size(), 1U);
@@ -67,7 +67,7 @@ TEST_F(CapabilitiesEnumerationTest, thereIsOneInstance)
     EXPECT_TRUE(messages_.empty());
 }
 
-TEST_F(CapabilitiesEnumerationTest, theStatesDoNotGrowFromRequestToRequest)
+TEST_F(CapabilitiesEnumerationTest, TheStatesDoNotGrowFromRequestToRequest)
 {
     getAll();
     getAll();
@@ -80,7 +80,7 @@ TEST_F(CapabilitiesEnumerationTest, theStatesDoNotGrowFromRequestToRequest)
             "[uint16 0, uint16 1, uint16 2]");
 }
 
-TEST_F(CapabilitiesEnumerationTest, theListAndTheObjectPathFlagReachTheInstance)
+TEST_F(CapabilitiesEnumerationTest, TheListAndTheObjectPathFlagReachTheInstance)
 {
     const char* properties[] = {"ElementNameEditSupported", nullptr};
     getAll(properties);
@@ -89,7 +89,7 @@ TEST_F(CapabilitiesEnumerationTest, theListAndTheObjectPathFlagReachTheInstance)
         EXPECT_EQ(property(*Host::Instance::of(instance), "RequestedStatesSupported"), "absent");
 }
 
-TEST_F(CapabilitiesEnumerationTest, whatIsThereStaysInTheVector)
+TEST_F(CapabilitiesEnumerationTest, WhatIsThereStaysInTheVector)
 {
     instances_.push_back(nullptr);
     getAll();
@@ -97,7 +97,7 @@ TEST_F(CapabilitiesEnumerationTest, whatIsThereStaysInTheVector)
     EXPECT_EQ(instances_[0], nullptr);
 }
 
-TEST_F(CapabilitiesEnumerationTest, anInstanceThatCannotBeMadeIsANullEntry)
+TEST_F(CapabilitiesEnumerationTest, AnInstanceThatCannotBeMadeIsANullEntry)
 {
     FaultyBroker faulty(broker_);
     faulty.plan({BrokerCall::newInstance, 1, FaultManner::nullResult});
@@ -107,7 +107,7 @@ TEST_F(CapabilitiesEnumerationTest, anInstanceThatCannotBeMadeIsANullEntry)
     EXPECT_THAT(instances_, ElementsAre(nullptr));
 }
 
-TEST_F(NoCapabilitiesTest, haveNoInstancesAndThatIsNoFailure)
+TEST_F(NoCapabilitiesTest, HaveNoInstancesAndThatIsNoFailure)
 {
     EXPECT_EQ(getAll(), 0);
     EXPECT_TRUE(instances_.empty());
@@ -116,21 +116,21 @@ TEST_F(NoCapabilitiesTest, haveNoInstancesAndThatIsNoFailure)
 
 // ---- One instance ----
 
-TEST_F(CapabilitiesEnumerationTest, oneInstanceIsFoundByItsWholeIdentifier)
+TEST_F(CapabilitiesEnumerationTest, OneInstanceIsFoundByItsWholeIdentifier)
 {
     EXPECT_EQ(getOne(Identifier), 0);
     ASSERT_EQ(instances_.size(), 1U);
     EXPECT_EQ(Host::Instance::of(instances_[0])->properties().size(), 3U);
 }
 
-TEST_F(CapabilitiesEnumerationTest, oneInstanceHasTheListedProperties)
+TEST_F(CapabilitiesEnumerationTest, OneInstanceHasTheListedProperties)
 {
     const char* properties[] = {"RequestedStatesSupported", nullptr};
     EXPECT_EQ(getOne(Identifier, properties), 0);
     EXPECT_EQ(Host::Instance::of(instances_.at(0))->properties().size(), 2U);
 }
 
-TEST_F(CapabilitiesEnumerationTest, anIdentifierIsNeitherFoldedNorTrimmed)
+TEST_F(CapabilitiesEnumerationTest, AnIdentifierIsNeitherFoldedNorTrimmed)
 {
     const std::string identifier = Identifier;
     for (const std::string& other : {std::string("zumlo:sensorenabledlogicalelementcap1"),
@@ -142,7 +142,7 @@ TEST_F(CapabilitiesEnumerationTest, anIdentifierIsNeitherFoldedNorTrimmed)
     EXPECT_TRUE(messages_.empty());
 }
 
-TEST_F(CapabilitiesEnumerationTest, anUnknownIdentifierLeavesTheStatusAsItWas)
+TEST_F(CapabilitiesEnumerationTest, AnUnknownIdentifierLeavesTheStatusAsItWas)
 {
     rc_ = {CMPI_RC_ERR_ACCESS_DENIED, nullptr};
     EXPECT_EQ(factory_.getOneSensorEnabledLogicalElementCapCMPIInstance(
@@ -153,7 +153,7 @@ TEST_F(CapabilitiesEnumerationTest, anUnknownIdentifierLeavesTheStatusAsItWas)
     EXPECT_TRUE(instances_.empty());
 }
 
-TEST_F(NoCapabilitiesTest, areNotFoundByTheirIdentifier)
+TEST_F(NoCapabilitiesTest, AreNotFoundByTheirIdentifier)
 {
     EXPECT_EQ(getOne(Identifier), 1);
     EXPECT_TRUE(instances_.empty());
@@ -161,7 +161,7 @@ TEST_F(NoCapabilitiesTest, areNotFoundByTheirIdentifier)
 
 // ---- Object paths ----
 
-TEST_F(CapabilitiesEnumerationTest, anObjectPathHasItsOneKey)
+TEST_F(CapabilitiesEnumerationTest, AnObjectPathHasItsOneKey)
 {
     EXPECT_EQ(getPaths(), 0);
     ASSERT_EQ(paths_.size(), 1U);
@@ -175,7 +175,7 @@ TEST_F(CapabilitiesEnumerationTest, anObjectPathHasItsOneKey)
     EXPECT_TRUE(messages_.empty());
 }
 
-TEST_F(NoCapabilitiesTest, haveNoObjectPathsAndSayThatToTheBroker)
+TEST_F(NoCapabilitiesTest, HaveNoObjectPathsAndSayThatToTheBroker)
 {
     rc_ = {CMPI_RC_ERR_ACCESS_DENIED, nullptr};
     EXPECT_EQ(getPaths(), 1);
@@ -184,7 +184,7 @@ TEST_F(NoCapabilitiesTest, haveNoObjectPathsAndSayThatToTheBroker)
     EXPECT_THAT(messages_, ElementsAre(BrokerMessage{2, Provider, "***No instance found***"}));
 }
 
-TEST_F(CapabilitiesEnumerationTest, anObjectPathThatCannotBeMadeEndsTheEnumeration)
+TEST_F(CapabilitiesEnumerationTest, AnObjectPathThatCannotBeMadeEndsTheEnumeration)
 {
     for (const FaultManner manner : {FaultManner::nullResult, FaultManner::handleless}) {
         FaultyBroker faulty(broker_);
@@ -202,7 +202,7 @@ TEST_F(CapabilitiesEnumerationTest, anObjectPathThatCannotBeMadeEndsTheEnumerati
     }
 }
 
-TEST_F(CapabilitiesEnumerationTest, withoutAStatusAMissingPathIsToldToTheTraceAlone)
+TEST_F(CapabilitiesEnumerationTest, WithoutAStatusAMissingPathIsToldToTheTraceAlone)
 {
     FaultyBroker faulty(broker_);
     faulty.plan({BrokerCall::newObjectPath, 1, FaultManner::nullResult});
@@ -214,7 +214,7 @@ TEST_F(CapabilitiesEnumerationTest, withoutAStatusAMissingPathIsToldToTheTraceAl
 
 // ---- Trace lines of what ends early ----
 
-TEST_F(CapabilitiesEnumerationTest, anUnknownIdentifierLeavesTheExitingLineOut)
+TEST_F(CapabilitiesEnumerationTest, AnUnknownIdentifierLeavesTheExitingLineOut)
 {
     const LogCapture capture;
     getOne("unknown");
@@ -222,7 +222,7 @@ TEST_F(CapabilitiesEnumerationTest, anUnknownIdentifierLeavesTheExitingLineOut)
         ElementsAre("ENTERING 1134"));
 }
 
-TEST_F(NoCapabilitiesTest, haveAnExitingLineOfTheirOwn)
+TEST_F(NoCapabilitiesTest, HaveAnExitingLineOfTheirOwn)
 {
     const LogCapture capture;
     getPaths();
@@ -230,7 +230,7 @@ TEST_F(NoCapabilitiesTest, haveAnExitingLineOfTheirOwn)
         ElementsAre("ENTERING 1041", "EXITING 1104"));
 }
 
-TEST_F(CapabilitiesEnumerationTest, anObjectPathThatCannotBeMadeLeavesTheExitingLineOut)
+TEST_F(CapabilitiesEnumerationTest, AnObjectPathThatCannotBeMadeLeavesTheExitingLineOut)
 {
     const LogCapture capture;
     FaultyBroker faulty(broker_);

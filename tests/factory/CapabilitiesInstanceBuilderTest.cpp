@@ -63,7 +63,7 @@ protected:
     CMPIStatus rc_ = {CMPI_RC_OK, nullptr};
 };
 
-TEST_F(CapabilitiesInstanceBuilderTest, allPropertiesComeInOrder)
+TEST_F(CapabilitiesInstanceBuilderTest, AllPropertiesComeInOrder)
 {
     EXPECT_THAT(describe(make().properties()),
         ElementsAre("InstanceID = string \"ZUMLO:SensorEnabledLogicalElementCap1\"",
@@ -73,7 +73,7 @@ TEST_F(CapabilitiesInstanceBuilderTest, allPropertiesComeInOrder)
     EXPECT_TRUE(messages_.empty());
 }
 
-TEST_F(CapabilitiesInstanceBuilderTest, theRecordIsReadAsACopy)
+TEST_F(CapabilitiesInstanceBuilderTest, TheRecordIsReadAsACopy)
 {
     const SensorEnabledLogCap record;
     make(nullptr, false, record);
@@ -81,7 +81,7 @@ TEST_F(CapabilitiesInstanceBuilderTest, theRecordIsReadAsACopy)
         "[uint16 0, uint16 1, uint16 2]");
 }
 
-TEST_F(CapabilitiesInstanceBuilderTest, aRecordThatWasReadBeforeCarriesItsStatesAgain)
+TEST_F(CapabilitiesInstanceBuilderTest, ARecordThatWasReadBeforeCarriesItsStatesAgain)
 {
     SensorEnabledLogCap record;
     record.getStatesSupported();
@@ -89,13 +89,13 @@ TEST_F(CapabilitiesInstanceBuilderTest, aRecordThatWasReadBeforeCarriesItsStates
         "[uint16 0, uint16 1, uint16 2, uint16 0, uint16 1, uint16 2]");
 }
 
-TEST_F(CapabilitiesInstanceBuilderTest, anObjectPathNeedsNoStates)
+TEST_F(CapabilitiesInstanceBuilderTest, AnObjectPathNeedsNoStates)
 {
     EXPECT_THAT(namesOf(make(nullptr, true).properties()),
         ElementsAre("InstanceID", "ElementNameEditSupported"));
 }
 
-TEST_F(CapabilitiesInstanceBuilderTest, aPropertyListDecidesWhateverTheObjectPathFlagSays)
+TEST_F(CapabilitiesInstanceBuilderTest, APropertyListDecidesWhateverTheObjectPathFlagSays)
 {
     for (const bool isObjPath : {false, true})
         EXPECT_THAT(namesWith({"RequestedStatesSupported", "ElementNameEditSupported"}, isObjPath),
@@ -103,7 +103,7 @@ TEST_F(CapabilitiesInstanceBuilderTest, aPropertyListDecidesWhateverTheObjectPat
 }
 
 // The broker's filter holds the list as well, so what it does not name is dropped there.
-TEST_F(CapabilitiesInstanceBuilderTest, aListSelectsItsPropertiesAndTheKey)
+TEST_F(CapabilitiesInstanceBuilderTest, AListSelectsItsPropertiesAndTheKey)
 {
     EXPECT_THAT(namesWith({"RequestedStatesSupported"}),
         ElementsAre("InstanceID", "RequestedStatesSupported"));
@@ -113,7 +113,7 @@ TEST_F(CapabilitiesInstanceBuilderTest, aListSelectsItsPropertiesAndTheKey)
     EXPECT_THAT(namesWith({}), ElementsAre("InstanceID"));
 }
 
-TEST_F(CapabilitiesInstanceBuilderTest, theEditFlagIsSetWhateverTheListNames)
+TEST_F(CapabilitiesInstanceBuilderTest, TheEditFlagIsSetWhateverTheListNames)
 {
     const char* lists[][2] = {{"ElementName", nullptr}, {nullptr, nullptr}};
     for (const char** const list : lists) {
@@ -124,7 +124,7 @@ TEST_F(CapabilitiesInstanceBuilderTest, theEditFlagIsSetWhateverTheListNames)
     }
 }
 
-TEST_F(CapabilitiesInstanceBuilderTest, aListIsReadToItsNullEntry)
+TEST_F(CapabilitiesInstanceBuilderTest, AListIsReadToItsNullEntry)
 {
     EXPECT_THAT(namesWith({"A", "B", "RequestedStatesSupported", "C"}),
         ElementsAre("InstanceID", "RequestedStatesSupported"));
@@ -132,14 +132,14 @@ TEST_F(CapabilitiesInstanceBuilderTest, aListIsReadToItsNullEntry)
     EXPECT_THAT(namesOf(make(list).properties()), ElementsAre("InstanceID"));
 }
 
-TEST_F(CapabilitiesInstanceBuilderTest, namesAreComparedLetterForLetter)
+TEST_F(CapabilitiesInstanceBuilderTest, NamesAreComparedLetterForLetter)
 {
     for (const char* const name :
         {"requestedstatessupported", "RequestedStatesSupported ", "RequestedStatesSupporte"})
         EXPECT_THAT(namesWith({name}), ElementsAre("InstanceID")) << name;
 }
 
-TEST_F(CapabilitiesInstanceBuilderTest, thePathHasTheRequestsNamespaceAndThisSystemAsHost)
+TEST_F(CapabilitiesInstanceBuilderTest, ThePathHasTheRequestsNamespaceAndThisSystemAsHost)
 {
     SensorFactory factory;
     const Host::Instance* const instance =
@@ -157,7 +157,7 @@ TEST_F(CapabilitiesInstanceBuilderTest, thePathHasTheRequestsNamespaceAndThisSys
 
 // ---- Failures of the broker ----
 
-TEST_F(CapabilitiesInstanceBuilderTest, withoutAPathThereIsNoInstance)
+TEST_F(CapabilitiesInstanceBuilderTest, WithoutAPathThereIsNoInstance)
 {
     for (const FaultManner manner : {FaultManner::nullResult, FaultManner::handleless}) {
         const LogCapture capture;
@@ -171,7 +171,7 @@ TEST_F(CapabilitiesInstanceBuilderTest, withoutAPathThereIsNoInstance)
     }
 }
 
-TEST_F(CapabilitiesInstanceBuilderTest, anInstanceTheBrokerDoesNotMakeIsReturnedAsItCame)
+TEST_F(CapabilitiesInstanceBuilderTest, AnInstanceTheBrokerDoesNotMakeIsReturnedAsItCame)
 {
     EXPECT_EQ(buildWith({BrokerCall::newInstance, 1, FaultManner::nullResult}, &rc_), nullptr);
     EXPECT_EQ(rc_.rc, CMPI_RC_OK); // the broker is handed no status
@@ -182,7 +182,7 @@ TEST_F(CapabilitiesInstanceBuilderTest, anInstanceTheBrokerDoesNotMakeIsReturned
     EXPECT_TRUE(messages_.empty());
 }
 
-TEST_F(CapabilitiesInstanceBuilderTest, anArrayThatCannotBeMadeIsReportedAndLeftOut)
+TEST_F(CapabilitiesInstanceBuilderTest, AnArrayThatCannotBeMadeIsReportedAndLeftOut)
 {
     for (const FaultManner manner : {FaultManner::nullResult, FaultManner::handleless}) {
         const LogCapture capture;
@@ -201,7 +201,7 @@ TEST_F(CapabilitiesInstanceBuilderTest, anArrayThatCannotBeMadeIsReportedAndLeft
     }
 }
 
-TEST_F(CapabilitiesInstanceBuilderTest, withoutAStatusAMissingArrayIsToldToTheTraceAlone)
+TEST_F(CapabilitiesInstanceBuilderTest, WithoutAStatusAMissingArrayIsToldToTheTraceAlone)
 {
     const CMPIInstance* const made =
         buildWith({BrokerCall::newArray, 1, FaultManner::nullResult}, nullptr);

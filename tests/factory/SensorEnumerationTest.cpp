@@ -45,7 +45,7 @@ protected:
     EmptyMachineTest() : SensorEnumerationTest({}) {}
 };
 
-TEST_F(SensorEnumerationTest, instancesComeInTheOrderOfTheirIdentifiers)
+TEST_F(SensorEnumerationTest, InstancesComeInTheOrderOfTheirIdentifiers)
 {
     EXPECT_EQ(factory_.getAllSensorCMPIInstances(
                   broker(), path("C").handle(), nullptr, false, instances_, &rc_),
@@ -57,7 +57,7 @@ TEST_F(SensorEnumerationTest, instancesComeInTheOrderOfTheirIdentifiers)
     EXPECT_EQ(rc_.rc, CMPI_RC_OK);
 }
 
-TEST_F(SensorEnumerationTest, instancesForObjectPathsHaveTheKeysAlone)
+TEST_F(SensorEnumerationTest, InstancesForObjectPathsHaveTheKeysAlone)
 {
     factory_.getAllSensorCMPIInstances(
         broker(), path("C").handle(), nullptr, true, instances_, &rc_);
@@ -65,7 +65,7 @@ TEST_F(SensorEnumerationTest, instancesForObjectPathsHaveTheKeysAlone)
     EXPECT_EQ(Host::Instance::of(instances_[0])->properties().size(), 4U);
 }
 
-TEST_F(SensorEnumerationTest, whatIsThereStaysInTheVector)
+TEST_F(SensorEnumerationTest, WhatIsThereStaysInTheVector)
 {
     instances_.push_back(nullptr);
     factory_.getAllSensorCMPIInstances(
@@ -74,7 +74,7 @@ TEST_F(SensorEnumerationTest, whatIsThereStaysInTheVector)
     EXPECT_EQ(instances_[0], nullptr);
 }
 
-TEST_F(EmptyMachineTest, hasNoInstancesAndThatIsNoFailure)
+TEST_F(EmptyMachineTest, HasNoInstancesAndThatIsNoFailure)
 {
     EXPECT_EQ(factory_.getAllSensorCMPIInstances(
                   broker(), path("C").handle(), nullptr, false, instances_, &rc_),
@@ -83,7 +83,7 @@ TEST_F(EmptyMachineTest, hasNoInstancesAndThatIsNoFailure)
     EXPECT_TRUE(messages_.empty());
 }
 
-TEST_F(SensorEnumerationTest, oneInstanceIsFoundByItsWholeIdentifier)
+TEST_F(SensorEnumerationTest, OneInstanceIsFoundByItsWholeIdentifier)
 {
     EXPECT_EQ(getOne("Y:/p"), 0);
     ASSERT_EQ(instances_.size(), 1U);
@@ -104,7 +104,7 @@ protected:
     }
 };
 
-TEST_F(DuplicateTest, theLastSensorOfOneIdentifierIsTheOnePublished)
+TEST_F(DuplicateTest, TheLastSensorOfOneIdentifierIsTheOnePublished)
 {
     EXPECT_EQ(getOne("one:/same"), 0);
     ASSERT_EQ(instances_.size(), 1U);
@@ -126,7 +126,7 @@ protected:
     }
 };
 
-TEST_F(ManyTest, asManyAreServedAsTheirCountCutTo16BitsSaysFromTheFirstHarvested)
+TEST_F(ManyTest, AsManyAreServedAsTheirCountCutTo16BitsSaysFromTheFirstHarvested)
 {
     EXPECT_EQ(factory_.getNumberOfInstances(), 1);
     EXPECT_EQ(factory_.getAllSensorCMPIObjPaths(broker(), path("C").handle(), paths_, &rc_), 0);
@@ -139,14 +139,14 @@ protected:
     FullCountTest() : ManyTest(65536) {}
 };
 
-TEST_F(FullCountTest, exactlyAFull16BitCountOfSensorsIsNone)
+TEST_F(FullCountTest, ExactlyAFull16BitCountOfSensorsIsNone)
 {
     EXPECT_EQ(factory_.getNumberOfInstances(), 0);
     EXPECT_EQ(factory_.getAllSensorCMPIObjPaths(broker(), path("C").handle(), paths_, &rc_), 1);
     EXPECT_TRUE(paths_.empty());
 }
 
-TEST_F(SensorEnumerationTest, anIdentifierIsNeitherFoldedNorTrimmed)
+TEST_F(SensorEnumerationTest, AnIdentifierIsNeitherFoldedNorTrimmed)
 {
     for (const char* const other : {"y:/p", "Y:/P", " Y:/p", "Y:/p ", "Y:/", "Y:/p2", ""})
         EXPECT_EQ(getOne(other), 1) << other;
@@ -155,14 +155,14 @@ TEST_F(SensorEnumerationTest, anIdentifierIsNeitherFoldedNorTrimmed)
     EXPECT_TRUE(messages_.empty());
 }
 
-TEST_F(SensorEnumerationTest, anAbsentKeyFindsNothing)
+TEST_F(SensorEnumerationTest, AnAbsentKeyFindsNothing)
 {
     EXPECT_EQ(factory_.getOneSensorCMPIInstance(
                   broker(), path("C").handle(), nullptr, nullptr, instances_, &rc_),
         1);
 }
 
-TEST_F(SensorEnumerationTest, anObjectPathHasTheFourKeysInOrder)
+TEST_F(SensorEnumerationTest, AnObjectPathHasTheFourKeysInOrder)
 {
     EXPECT_EQ(factory_.getAllSensorCMPIObjPaths(
                   broker(), path("C", {}, "root/other").handle(), paths_, &rc_),
@@ -182,7 +182,7 @@ TEST_F(SensorEnumerationTest, anObjectPathHasTheFourKeysInOrder)
     EXPECT_EQ(rc_.rc, CMPI_RC_OK);
 }
 
-TEST_F(EmptyMachineTest, hasNoObjectPathsAndSaysSoToTheBroker)
+TEST_F(EmptyMachineTest, HasNoObjectPathsAndSaysSoToTheBroker)
 {
     EXPECT_EQ(factory_.getAllSensorCMPIObjPaths(broker(), path("C").handle(), paths_, &rc_), 1);
     EXPECT_TRUE(paths_.empty());
@@ -191,7 +191,7 @@ TEST_F(EmptyMachineTest, hasNoObjectPathsAndSaysSoToTheBroker)
         ElementsAre(BrokerMessage{1, "SensorProfileProvider", "***No instance found***"}));
 }
 
-TEST_F(EmptyMachineTest, leavesAStatusThatWasSetAsItIs)
+TEST_F(EmptyMachineTest, LeavesAStatusThatWasSetAsItIs)
 {
     rc_ = {CMPI_RC_ERR_ACCESS_DENIED, nullptr};
     EXPECT_EQ(factory_.getAllSensorCMPIObjPaths(broker(), path("C").handle(), paths_, &rc_), 1);
@@ -201,14 +201,14 @@ TEST_F(EmptyMachineTest, leavesAStatusThatWasSetAsItIs)
 
 // ---- Trace lines of what ends early ----
 
-TEST_F(SensorEnumerationTest, anUnknownIdentifierLeavesTheExitingLineOut)
+TEST_F(SensorEnumerationTest, AnUnknownIdentifierLeavesTheExitingLineOut)
 {
     const LogCapture capture;
     getOne("unknown");
     EXPECT_EQ(capture.marksOf("getOneSensorCMPIInstance").size(), 1U);
 }
 
-TEST_F(EmptyMachineTest, hasItsObjectPathsTracedToo)
+TEST_F(EmptyMachineTest, HasItsObjectPathsTracedToo)
 {
     const LogCapture capture;
     factory_.getAllSensorCMPIObjPaths(broker(), path("C").handle(), paths_, &rc_);

@@ -55,7 +55,7 @@ INSTANTIATE_TEST_SUITE_P(NullOrHandleless, UndeliveredTest,
 const BrokerMessage PathFailed = {2, "SensorProfileProvider",
     "Create CMPIObjectPath                     failed for RecordLogClass."};
 
-TEST_P(UndeliveredTest, aPathThatCannotBeMadeIsAFailureOfTheBroker)
+TEST_P(UndeliveredTest, APathThatCannotBeMadeIsAFailureOfTheBroker)
 {
     faulty_.plan({BrokerCall::newObjectPath, 1, GetParam()});
     EXPECT_EQ(makePaths(&rc_), 2);
@@ -65,7 +65,7 @@ TEST_P(UndeliveredTest, aPathThatCannotBeMadeIsAFailureOfTheBroker)
     EXPECT_THAT(messages_, ElementsAre(PathFailed));
 }
 
-TEST_P(UndeliveredTest, thePathsBeforeTheOneThatCannotBeMadeStay)
+TEST_P(UndeliveredTest, ThePathsBeforeTheOneThatCannotBeMadeStay)
 {
     faulty_.plan({BrokerCall::newObjectPath, 2, GetParam()});
     EXPECT_EQ(makePaths(&rc_), 2);
@@ -73,7 +73,7 @@ TEST_P(UndeliveredTest, thePathsBeforeTheOneThatCannotBeMadeStay)
     EXPECT_EQ(Host::ObjectPath::of(paths_[0])->key("DeviceID")->text(), "A:/t");
 }
 
-TEST_P(UndeliveredTest, aFailureOfPathsNeedsNoStatus)
+TEST_P(UndeliveredTest, AFailureOfPathsNeedsNoStatus)
 {
     faulty_.plan({BrokerCall::newObjectPath, 1, GetParam()});
     EXPECT_EQ(makePaths(nullptr), 2);
@@ -81,7 +81,7 @@ TEST_P(UndeliveredTest, aFailureOfPathsNeedsNoStatus)
     EXPECT_THAT(messages_, ElementsAre(PathFailed));
 }
 
-TEST_P(UndeliveredTest, aFailureOfPathsHasItsExitingLine)
+TEST_P(UndeliveredTest, AFailureOfPathsHasItsExitingLine)
 {
     faulty_.plan({BrokerCall::newObjectPath, 2, GetParam()});
     const LogCapture capture;
@@ -92,7 +92,7 @@ TEST_P(UndeliveredTest, aFailureOfPathsHasItsExitingLine)
 
 // ---- Instances ----
 
-TEST_P(UndeliveredTest, anInstanceWithoutAPathLeavesTheStatusAndHasItsExitingLine)
+TEST_P(UndeliveredTest, AnInstanceWithoutAPathLeavesTheStatusAndHasItsExitingLine)
 {
     faulty_.plan({BrokerCall::newObjectPath, 1, GetParam()});
     const LogCapture capture;
@@ -103,7 +103,7 @@ TEST_P(UndeliveredTest, anInstanceWithoutAPathLeavesTheStatusAndHasItsExitingLin
     EXPECT_THAT(messages_, IsEmpty());
 }
 
-TEST_P(UndeliveredTest, anInstanceThatCannotBeMadeLeavesTheStatusAndHasItsExitingLine)
+TEST_P(UndeliveredTest, AnInstanceThatCannotBeMadeLeavesTheStatusAndHasItsExitingLine)
 {
     faulty_.plan({BrokerCall::newInstance, 1, GetParam()});
     const LogCapture capture;
@@ -115,7 +115,7 @@ TEST_P(UndeliveredTest, anInstanceThatCannotBeMadeLeavesTheStatusAndHasItsExitin
 }
 
 // Alone in the list, so that no array after it has the broker write the status again.
-TEST_P(UndeliveredTest, withoutPossibleStatesTheStatusIsWhatTheBrokerMadeIt)
+TEST_P(UndeliveredTest, WithoutPossibleStatesTheStatusIsWhatTheBrokerMadeIt)
 {
     const char* properties[] = {"PossibleStates", nullptr};
     for (const CMPIrc code : {CMPI_RC_OK, CMPI_RC_ERR_INVALID_PARAMETER}) {
@@ -132,7 +132,7 @@ TEST_P(UndeliveredTest, withoutPossibleStatesTheStatusIsWhatTheBrokerMadeIt)
 }
 
 // The broker is handed the status when it reads the key.
-TEST_F(SensorFactoryFaultTest, anUnknownIdentifierLeavesTheStatusAsTheBrokerMadeIt)
+TEST_F(SensorFactoryFaultTest, AnUnknownIdentifierLeavesTheStatusAsTheBrokerMadeIt)
 {
     CMPIString* const key = CMNewString(faulty_.handle(), "unknown", nullptr);
     faulty_.plan({BrokerCall::getCharPtr, 1, FaultManner::errorStatus, CMPI_RC_ERR_NOT_FOUND});

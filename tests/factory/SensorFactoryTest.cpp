@@ -34,14 +34,14 @@ std::vector<std::string> factoryLines(const LogCapture& capture)
     return found;
 }
 
-TEST(SensorFactory, withoutFlagsHarvestsNothing)
+TEST(SensorFactoryTest, WithoutFlagsHarvestsNothing)
 {
     const ScriptedMachine machine(TwoSensors);
     EXPECT_EQ(SensorFactory().getNumberOfInstances(), 0);
     EXPECT_EQ(SensorFactory(false, false).getNumberOfInstances(), 0);
 }
 
-TEST(SensorFactory, countsSensorsAndNotCapabilities)
+TEST(SensorFactoryTest, CountsSensorsAndNotCapabilities)
 {
     const ScriptedMachine machine(TwoSensors);
     EXPECT_EQ(SensorFactory(true, false).getNumberOfInstances(), 2);
@@ -49,14 +49,14 @@ TEST(SensorFactory, countsSensorsAndNotCapabilities)
     EXPECT_EQ(SensorFactory(false, true).getNumberOfInstances(), 0);
 }
 
-TEST(SensorFactory, countsSensorsOfOneIdentifierOnce)
+TEST(SensorFactoryTest, CountsSensorsOfOneIdentifierOnce)
 {
     const ScriptedMachine machine({{NodeType::Temperature, "/same", "t", NodeReading{}},
         {NodeType::Voltage, "/same", "t", NodeReading{}}});
     EXPECT_EQ(SensorFactory(true, false).getNumberOfInstances(), 1);
 }
 
-TEST(SensorFactory, ofAFailedHarvestHasNoSensorsThoughRecordsWereAppended)
+TEST(SensorFactoryTest, OfAFailedHarvestHasNoSensorsThoughRecordsWereAppended)
 {
     ScriptedNode broken = {NodeType::Temperature, "/b", "b", NodeReading{}};
     broken.failsWhenRead = true;
@@ -67,7 +67,7 @@ TEST(SensorFactory, ofAFailedHarvestHasNoSensorsThoughRecordsWereAppended)
     EXPECT_EQ(factory.getNumberOfInstances(), 0);
 }
 
-TEST(SensorFactory, cutsItsCountTo16Bits)
+TEST(SensorFactoryTest, CutsItsCountTo16Bits)
 {
     std::vector<ScriptedNode> nodes(65537, {NodeType::Temperature, "", "sensor", NodeReading{}});
     for (std::size_t i = 0; i < nodes.size(); ++i)
@@ -76,7 +76,7 @@ TEST(SensorFactory, cutsItsCountTo16Bits)
     EXPECT_EQ(SensorFactory(true, false).getNumberOfInstances(), 1);
 }
 
-TEST(SensorFactoryTrace, theDefaultConstructorAndTheDestructorWriteNothing)
+TEST(SensorFactoryTraceTest, TheDefaultConstructorAndTheDestructorWriteNothing)
 {
     const LogCapture capture;
     {
@@ -85,7 +85,7 @@ TEST(SensorFactoryTrace, theDefaultConstructorAndTheDestructorWriteNothing)
     EXPECT_TRUE(capture.log().empty());
 }
 
-TEST(SensorFactoryTrace, theRequestConstructorTracesItsFlagsAndItsMaps)
+TEST(SensorFactoryTraceTest, TheRequestConstructorTracesItsFlagsAndItsMaps)
 {
     const ScriptedMachine machine(TwoSensors);
     const LogCapture capture;
@@ -101,7 +101,8 @@ TEST(SensorFactoryTrace, theRequestConstructorTracesItsFlagsAndItsMaps)
             "isSen=1 isCap=1"));
 }
 
-TEST(SensorFactoryTrace, anExceptionThatIsNoStandardOneLeavesTheConstructorWithoutItsExitingLine)
+TEST(
+    SensorFactoryTraceTest, AnExceptionThatIsNoStandardOneLeavesTheConstructorWithoutItsExitingLine)
 {
     const Testing::WatchedMachine machine([] { throw Testing::StrangeException(); });
     const LogCapture capture;
@@ -112,7 +113,7 @@ TEST(SensorFactoryTrace, anExceptionThatIsNoStandardOneLeavesTheConstructorWitho
                     "List:  isSen=1 isCap=1"));
 }
 
-TEST(SensorFactoryTrace, aFailedHarvestBuildsNoMap)
+TEST(SensorFactoryTraceTest, AFailedHarvestBuildsNoMap)
 {
     const ScriptedMachine machine;
     const LogCapture capture;
@@ -124,7 +125,7 @@ TEST(SensorFactoryTrace, aFailedHarvestBuildsNoMap)
             "isSen=1 isCap=0"));
 }
 
-TEST(SensorFactoryTrace, countingIsMarkedWithoutParameters)
+TEST(SensorFactoryTraceTest, CountingIsMarkedWithoutParameters)
 {
     SensorFactory factory;
     const LogCapture capture;
@@ -134,7 +135,7 @@ TEST(SensorFactoryTrace, countingIsMarkedWithoutParameters)
             "4000 SensorFactory EXITING: getNumberOfInstances() in SensorFactory"));
 }
 
-TEST(SensorFactoryTrace, sensorsAreHarvestedBeforeCapabilities)
+TEST(SensorFactoryTraceTest, SensorsAreHarvestedBeforeCapabilities)
 {
     const ScriptedMachine machine(TwoSensors);
     const LogCapture capture;

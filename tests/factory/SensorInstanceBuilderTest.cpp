@@ -71,7 +71,7 @@ protected:
     CMPIStatus rc_ = {CMPI_RC_OK, nullptr};
 };
 
-TEST_F(SensorInstanceBuilderTest, aFullSensorHasAllPropertiesInOrder)
+TEST_F(SensorInstanceBuilderTest, AFullSensorHasAllPropertiesInOrder)
 {
     EXPECT_THAT(describe(make(fullSensor()).properties()),
         ElementsAre("CreationClassName = string \"ZUMLO_NumericSensor\"",
@@ -101,7 +101,7 @@ TEST_F(SensorInstanceBuilderTest, aFullSensorHasAllPropertiesInOrder)
     EXPECT_TRUE(messages_.empty());
 }
 
-TEST_F(SensorInstanceBuilderTest, captionAndDescriptionAreEnglishWhereNoLanguageIsSet)
+TEST_F(SensorInstanceBuilderTest, CaptionAndDescriptionAreEnglishWhereNoLanguageIsSet)
 {
     const Testing::EnvironmentVariable language("LC_ALL", "C.UTF-8");
     const Host::Instance& instance = make(fullSensor());
@@ -110,7 +110,7 @@ TEST_F(SensorInstanceBuilderTest, captionAndDescriptionAreEnglishWhereNoLanguage
         "string \"Numeric sensor CPU 1 Vcore, read from this computer's hardware\"");
 }
 
-TEST_F(SensorInstanceBuilderTest, captionAndDescriptionAreInTheLanguageThatIsSet)
+TEST_F(SensorInstanceBuilderTest, CaptionAndDescriptionAreInTheLanguageThatIsSet)
 {
     const Testing::EnvironmentVariable language("LC_ALL", "de_DE.UTF-8");
     const Host::Instance& instance = make(fullSensor());
@@ -119,7 +119,7 @@ TEST_F(SensorInstanceBuilderTest, captionAndDescriptionAreInTheLanguageThatIsSet
         "string \"Numerischer Sensor CPU 1 Vcore, ausgelesen aus der Hardware dieses Computers\"");
 }
 
-TEST_F(SensorInstanceBuilderTest, anEmptyRecordPublishesItsDefaults)
+TEST_F(SensorInstanceBuilderTest, AnEmptyRecordPublishesItsDefaults)
 {
     const Host::Instance& instance = make(Sensor());
     EXPECT_EQ(property(instance, "CurrentState"), "string \"\"");
@@ -136,21 +136,21 @@ TEST_F(SensorInstanceBuilderTest, anEmptyRecordPublishesItsDefaults)
         EXPECT_EQ(property(instance, threshold), "absent") << threshold;
 }
 
-TEST_F(SensorInstanceBuilderTest, aThresholdThatScalesToZeroIsLeftOut)
+TEST_F(SensorInstanceBuilderTest, AThresholdThatScalesToZeroIsLeftOut)
 {
     Sensor sensor = fullSensor();
     sensor.setUpperThresholdFatal(0.0004);
     EXPECT_EQ(property(make(sensor), "UpperThresholdFatal"), "absent");
 }
 
-TEST_F(SensorInstanceBuilderTest, aNegativeThresholdIsPublished)
+TEST_F(SensorInstanceBuilderTest, ANegativeThresholdIsPublished)
 {
     Sensor sensor = fullSensor();
     sensor.setLowerThresholdFatal(-0.5);
     EXPECT_EQ(property(make(sensor), "LowerThresholdFatal"), "sint32 -500");
 }
 
-TEST_F(SensorInstanceBuilderTest, theStoredRecordIsUntouched)
+TEST_F(SensorInstanceBuilderTest, TheStoredRecordIsUntouched)
 {
     Sensor sensor = fullSensor();
     make(sensor);
@@ -158,23 +158,23 @@ TEST_F(SensorInstanceBuilderTest, theStoredRecordIsUntouched)
     EXPECT_EQ(sensor.getPossibleStates().size(), 14U);
 }
 
-TEST_F(SensorInstanceBuilderTest, anObjectPathNeedsTheKeysAlone)
+TEST_F(SensorInstanceBuilderTest, AnObjectPathNeedsTheKeysAlone)
 {
     EXPECT_EQ(namesOf(make(fullSensor(), nullptr, true).properties()), keys());
 }
 
-TEST_F(SensorInstanceBuilderTest, aPropertyListDecidesWhateverTheObjectPathFlagSays)
+TEST_F(SensorInstanceBuilderTest, APropertyListDecidesWhateverTheObjectPathFlagSays)
 {
     EXPECT_EQ(namesWith({"Name"}, true), keysAnd({"Name"}));
     EXPECT_EQ(namesWith({"Name"}, false), keysAnd({"Name"}));
 }
 
-TEST_F(SensorInstanceBuilderTest, anEmptyListSelectsTheKeysAlone)
+TEST_F(SensorInstanceBuilderTest, AnEmptyListSelectsTheKeysAlone)
 {
     EXPECT_EQ(namesWith({}), keys());
 }
 
-TEST_F(SensorInstanceBuilderTest, eachPropertyIsSelectedByItsName)
+TEST_F(SensorInstanceBuilderTest, EachPropertyIsSelectedByItsName)
 {
     for (const char* const name :
         {"Caption", "Description", "Name", "ElementName", "CurrentState", "PossibleStates",
@@ -186,23 +186,23 @@ TEST_F(SensorInstanceBuilderTest, eachPropertyIsSelectedByItsName)
 }
 
 // The broker's filter holds the list as well: Status is dropped there unless it is listed.
-TEST_F(SensorInstanceBuilderTest, statusTravelsWithHealthState)
+TEST_F(SensorInstanceBuilderTest, StatusTravelsWithHealthState)
 {
     EXPECT_EQ(namesWith({"Status"}), keys());
     EXPECT_EQ(namesWith({"HealthState", "Status"}), keysAnd({"HealthState", "Status"}));
 }
 
-TEST_F(SensorInstanceBuilderTest, namesAreComparedLetterForLetter)
+TEST_F(SensorInstanceBuilderTest, NamesAreComparedLetterForLetter)
 {
     EXPECT_EQ(namesWith({"healthstate"}), keys());
 }
 
-TEST_F(SensorInstanceBuilderTest, keysAreSetAlsoWhenTheyAreListed)
+TEST_F(SensorInstanceBuilderTest, KeysAreSetAlsoWhenTheyAreListed)
 {
     EXPECT_EQ(namesWith({"DeviceID", "Name"}), keysAnd({"Name"}));
 }
 
-TEST_F(SensorInstanceBuilderTest, thePathHasTheRequestsNamespaceAndThisSystemAsHost)
+TEST_F(SensorInstanceBuilderTest, ThePathHasTheRequestsNamespaceAndThisSystemAsHost)
 {
     SensorFactory factory;
     const Host::ObjectPath& ref = path("ANY_Class", {}, "root/other");
@@ -216,7 +216,7 @@ TEST_F(SensorInstanceBuilderTest, thePathHasTheRequestsNamespaceAndThisSystemAsH
     EXPECT_EQ(namesOf(made.keys()), keys());
 }
 
-TEST_F(SensorInstanceBuilderTest, aUtf8NameComesOutWholeInCaptionAndDescription)
+TEST_F(SensorInstanceBuilderTest, AUtf8NameComesOutWholeInCaptionAndDescription)
 {
     Sensor sensor = fullSensor();
     sensor.setElementName("Lüfter №1 — 風扇 🌀");
@@ -225,14 +225,14 @@ TEST_F(SensorInstanceBuilderTest, aUtf8NameComesOutWholeInCaptionAndDescription)
     EXPECT_THAT(property(instance, "Description"), ::testing::HasSubstr("Lüfter №1 — 風扇 🌀"));
 }
 
-TEST_F(SensorInstanceBuilderTest, aNameThatLooksLikeAFormatIsTakenAsItIs)
+TEST_F(SensorInstanceBuilderTest, ANameThatLooksLikeAFormatIsTakenAsItIs)
 {
     Sensor sensor = fullSensor();
     sensor.setElementName("100%s%n %d");
     EXPECT_THAT(property(make(sensor), "Caption"), ::testing::HasSubstr("100%s%n %d"));
 }
 
-TEST_F(SensorInstanceBuilderTest, aLongNameIsCutInCaptionButNotInName)
+TEST_F(SensorInstanceBuilderTest, ALongNameIsCutInCaptionButNotInName)
 {
     Sensor sensor = fullSensor();
     std::string name;
@@ -246,7 +246,7 @@ TEST_F(SensorInstanceBuilderTest, aLongNameIsCutInCaptionButNotInName)
     EXPECT_EQ(property(instance, "Name"), "string \"" + name + "\"");
 }
 
-TEST_F(SensorInstanceBuilderTest, exactlyAFull16BitCountOfLabelsIsNoProperty)
+TEST_F(SensorInstanceBuilderTest, ExactlyAFull16BitCountOfLabelsIsNoProperty)
 {
     Sensor sensor = fullSensor();
     sensor.setPossibleStates(std::vector<unsigned>(65536 - 12, 1));

@@ -20,7 +20,7 @@ std::vector<SensorEnabledLogCap> fullVector()
     return capabilities;
 }
 
-TEST(CapabilitiesHarvest, reportsTheFailuresOwnTextWhenTheRecordCannotBeAppended)
+TEST(CapabilitiesHarvestTest, ReportsTheFailuresOwnTextWhenTheRecordCannotBeAppended)
 {
     auto capabilities = fullVector();
     const Testing::LogCapture capture;

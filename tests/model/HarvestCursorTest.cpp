@@ -22,7 +22,7 @@ using Testing::LogLine;
 using Testing::StrangeException;
 using Testing::WatchedMachine;
 
-TEST(HarvestCursor, isMadeForEachTypeAndGoneBeforeTheNext)
+TEST(HarvestCursorTest, IsMadeForEachTypeAndGoneBeforeTheNext)
 {
     const WatchedMachine machine([] {});
     std::vector<Sensor> sensors;
@@ -33,7 +33,7 @@ TEST(HarvestCursor, isMadeForEachTypeAndGoneBeforeTheNext)
     EXPECT_EQ(machine.cursorsLeft(), 0U);
 }
 
-TEST(HarvestCursor, isGoneBeforeTheNextAlsoWhenItsWalkFailed)
+TEST(HarvestCursorTest, IsGoneBeforeTheNextAlsoWhenItsWalkFailed)
 {
     const WatchedMachine machine([] { throw std::runtime_error("no reading"); });
     std::vector<Sensor> sensors;
@@ -45,7 +45,7 @@ TEST(HarvestCursor, isGoneBeforeTheNextAlsoWhenItsWalkFailed)
     EXPECT_EQ(machine.cursorsLeft(), 0U);
 }
 
-TEST(HarvestFailure, ofAKindThatIsNoStandardExceptionIsTheCallers)
+TEST(HarvestFailureTest, OfAKindThatIsNoStandardExceptionIsTheCallers)
 {
     const WatchedMachine machine([] { throw StrangeException(); });
     const LogCapture capture;
@@ -62,7 +62,7 @@ TEST(HarvestFailure, ofAKindThatIsNoStandardExceptionIsTheCallers)
     EXPECT_THAT(marks, ElementsAre(668, 740)); // entered, not left
 }
 
-TEST(Harvest, namesASensorByThePrintableFormOfItsPath)
+TEST(HarvestTest, NamesASensorByThePrintableFormOfItsPath)
 {
     const Testing::ScriptedMachine machine(
         {{Vorn::NodeLexicon::NodeType::Temperature, "/a\n\xFF", "CPU", Vorn::NodeReading{}}});

@@ -65,7 +65,7 @@ protected:
     }
 };
 
-TEST_F(RefusalTest, valuesAreHandedOverInOrder)
+TEST_F(RefusalTest, ValuesAreHandedOverInOrder)
 {
     const ScriptedMachine machine({fullNode(NodeType::Voltage, "v")});
     std::vector<Sensor> sensors;
@@ -76,7 +76,7 @@ TEST_F(RefusalTest, valuesAreHandedOverInOrder)
     EXPECT_EQ(Testing::setterCalls, expected);
 }
 
-TEST_F(RefusalTest, aStatusOfZeroCallsNoneOfTheFourStatusSetters)
+TEST_F(RefusalTest, AStatusOfZeroCallsNoneOfTheFourStatusSetters)
 {
     ScriptedNode node = fullNode(NodeType::Voltage, "v");
     node.reading = {};
@@ -87,7 +87,7 @@ TEST_F(RefusalTest, aStatusOfZeroCallsNoneOfTheFourStatusSetters)
                                         "setSensorType", "setRequestedState"}));
 }
 
-TEST_F(RefusalTest, eachRefusedValueThrowsItsMessage)
+TEST_F(RefusalTest, EachRefusedValueThrowsItsMessage)
 {
     for (const Refusal& refusal : Refusals) {
         const ScriptedMachine machine({fullNode(NodeType::Temperature, "t")});
@@ -107,7 +107,7 @@ TEST_F(RefusalTest, eachRefusedValueThrowsItsMessage)
     }
 }
 
-TEST_F(RefusalTest, aRefusedValueEndsTheWalkOfItsTypeWithTheGenericText)
+TEST_F(RefusalTest, ARefusedValueEndsTheWalkOfItsTypeWithTheGenericText)
 {
     for (const Refusal& refusal : Refusals) {
         const ScriptedMachine machine(

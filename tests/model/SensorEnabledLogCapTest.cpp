@@ -9,28 +9,28 @@ namespace {
 using Vorn::SensorProfileProvider::SensorEnabledLogCap;
 using States = std::vector<std::uint16_t>;
 
-TEST(SensorEnabledLogCap, theInstanceIdentifierIsTheSameAtEveryCall)
+TEST(SensorEnabledLogCapTest, TheInstanceIdentifierIsTheSameAtEveryCall)
 {
     SensorEnabledLogCap capabilities;
     EXPECT_EQ(capabilities.getInstanceID(), "ZUMLO:SensorEnabledLogicalElementCap1");
     EXPECT_EQ(capabilities.getInstanceID(), "ZUMLO:SensorEnabledLogicalElementCap1");
 }
 
-TEST(SensorEnabledLogCap, namesCannotBeEdited)
+TEST(SensorEnabledLogCapTest, NamesCannotBeEdited)
 {
     SensorEnabledLogCap capabilities;
     EXPECT_FALSE(capabilities.getElementNameEditSupported());
     EXPECT_FALSE(capabilities.getElementNameEditSupported());
 }
 
-TEST(SensorEnabledLogCap, theStatesGrowWithEveryReading)
+TEST(SensorEnabledLogCapTest, TheStatesGrowWithEveryReading)
 {
     SensorEnabledLogCap capabilities;
     EXPECT_EQ(capabilities.getStatesSupported(), (States{0, 1, 2}));
     EXPECT_EQ(capabilities.getStatesSupported(), (States{0, 1, 2, 0, 1, 2}));
 }
 
-TEST(SensorEnabledLogCap, aCopyCarriesTheStatesReadSoFarAndGrowsOnItsOwn)
+TEST(SensorEnabledLogCapTest, ACopyCarriesTheStatesReadSoFarAndGrowsOnItsOwn)
 {
     SensorEnabledLogCap capabilities;
     capabilities.getStatesSupported();

@@ -65,7 +65,7 @@ std::string address(const void* pointer)
     return out.str();
 }
 
-TEST(Harvest, ofAMachineWithoutSensorsReportsThatNothingWasFound)
+TEST(HarvestTest, OfAMachineWithoutSensorsReportsThatNothingWasFound)
 {
     const ScriptedMachine machine;
     const Harvest result = harvest();
@@ -74,7 +74,7 @@ TEST(Harvest, ofAMachineWithoutSensorsReportsThatNothingWasFound)
     EXPECT_EQ(result.standardError, "");
 }
 
-TEST(Harvest, thatFailsOutlivesAStandardErrorThatNobodyReads)
+TEST(HarvestTest, ThatFailsOutlivesAStandardErrorThatNobodyReads)
 {
     ScriptedMachine machine;
     machine.failConstruction();
@@ -91,7 +91,7 @@ TEST(Harvest, thatFailsOutlivesAStandardErrorThatNobodyReads)
     EXPECT_TRUE(nothing);
 }
 
-TEST(NodeLexicon, numbersAreThoseOfTheHardwareModel)
+TEST(NodeLexiconTest, NumbersAreThoseOfTheHardwareModel)
 {
     using Vorn::NodeLexicon::Properties;
     EXPECT_THAT((std::vector{Tachometer, Voltage, Temperature}),
@@ -104,7 +104,7 @@ TEST(NodeLexicon, numbersAreThoseOfTheHardwareModel)
             Properties{62}, Properties{88}, Properties{103}, Properties{125}));
 }
 
-TEST(Harvest, goesThroughTemperaturesThenVoltagesThenTachometers)
+TEST(HarvestTest, GoesThroughTemperaturesThenVoltagesThenTachometers)
 {
     const ScriptedMachine machine({node(Tachometer, "fan1"), node(Voltage, "in1"),
         node(Temperature, "temp1"), node(Tachometer, "fan2"), node(Temperature, "temp2")});
@@ -113,7 +113,7 @@ TEST(Harvest, goesThroughTemperaturesThenVoltagesThenTachometers)
     EXPECT_THAT(names(result.sensors), ElementsAre("temp1", "temp2", "in1", "fan1", "fan2"));
 }
 
-TEST(Harvest, ofFansAloneSucceeds)
+TEST(HarvestTest, OfFansAloneSucceeds)
 {
     const ScriptedMachine machine({node(Tachometer, "fan1")});
     const Harvest result = harvest();
@@ -121,7 +121,7 @@ TEST(Harvest, ofFansAloneSucceeds)
     EXPECT_EQ(result.sensors.size(), 1U);
 }
 
-TEST(Harvest, appendsToWhatIsThere)
+TEST(HarvestTest, AppendsToWhatIsThere)
 {
     const ScriptedMachine machine({node(Tachometer, "fan1")});
     std::vector<Sensor> sensors(2);
@@ -129,7 +129,7 @@ TEST(Harvest, appendsToWhatIsThere)
     EXPECT_THAT(names(sensors), ElementsAre("", "", "fan1"));
 }
 
-TEST(Harvest, namesASensorByItsDescriptionAndPath)
+TEST(HarvestTest, NamesASensorByItsDescriptionAndPath)
 {
     const ScriptedMachine machine({{Temperature, "/a/b", "CPU 1 Temp", NodeReading{}},
         {Temperature, "/a/c", "CPU 1 Temp", NodeReading{}}});
@@ -140,7 +140,7 @@ TEST(Harvest, namesASensorByItsDescriptionAndPath)
     EXPECT_EQ(result.sensors[0].getElementName(), "CPU 1 Temp");
 }
 
-TEST(Harvest, takesTheTypeThatTheNodeReports)
+TEST(HarvestTest, TakesTheTypeThatTheNodeReports)
 {
     ScriptedNode odd = node(Temperature, "odd");
     odd.sensorType = 21;
@@ -153,7 +153,7 @@ TEST(Harvest, takesTheTypeThatTheNodeReports)
     EXPECT_EQ(result.sensors[1].getSensorType(), 0);
 }
 
-TEST(Harvest, fillsEveryFieldOfASensor)
+TEST(HarvestTest, FillsEveryFieldOfASensor)
 {
     NodeReading reading;
     reading.status = 26;
@@ -189,7 +189,7 @@ TEST(Harvest, fillsEveryFieldOfASensor)
     EXPECT_EQ(sensor.getBaseUnits(), 5);
 }
 
-TEST(Harvest, ofANodeWithoutStatusOrPropertiesLeavesTheDefaults)
+TEST(HarvestTest, OfANodeWithoutStatusOrPropertiesLeavesTheDefaults)
 {
     const ScriptedMachine machine({node(Temperature, "bare")});
     Harvest result = harvest();
@@ -207,7 +207,7 @@ TEST(Harvest, ofANodeWithoutStatusOrPropertiesLeavesTheDefaults)
     EXPECT_EQ(sensor.getBaseUnits(), 0);
 }
 
-TEST(Harvest, doesNotCarryValuesFromOneNodeToTheNext)
+TEST(HarvestTest, DoesNotCarryValuesFromOneNodeToTheNext)
 {
     NodeReading reading;
     reading.reading = 50;
@@ -227,7 +227,7 @@ TEST(Harvest, doesNotCarryValuesFromOneNodeToTheNext)
 // What the base class says, never the failure's own text.
 const std::string Generic = "std::exception\n";
 
-TEST(HarvestFailure, atConstructionIsReportedOncePerTypeWithTheGenericText)
+TEST(HarvestFailureTest, AtConstructionIsReportedOncePerTypeWithTheGenericText)
 {
     ScriptedMachine machine({node(Temperature, "t")});
     machine.failConstruction();
@@ -237,7 +237,7 @@ TEST(HarvestFailure, atConstructionIsReportedOncePerTypeWithTheGenericText)
     EXPECT_EQ(result.standardError, Generic + Generic + Generic);
 }
 
-class HarvestFailureOfType : public ::testing::TestWithParam<NodeType> {
+class HarvestFailureOfTypeTest : public ::testing::TestWithParam<NodeType> {
 protected:
     std::vector<ScriptedNode> nodes() const
     {
@@ -258,7 +258,7 @@ protected:
     }
 };
 
-TEST_P(HarvestFailureOfType, atSelectionLeavesTheOtherTypes)
+TEST_P(HarvestFailureOfTypeTest, AtSelectionLeavesTheOtherTypes)
 {
     ScriptedMachine machine(nodes());
     machine.failSelection(GetParam());
@@ -268,7 +268,7 @@ TEST_P(HarvestFailureOfType, atSelectionLeavesTheOtherTypes)
     EXPECT_EQ(result.standardError, Generic);
 }
 
-TEST_P(HarvestFailureOfType, atAPropertyKeepsTheNodesBeforeIt)
+TEST_P(HarvestFailureOfTypeTest, AtAPropertyKeepsTheNodesBeforeIt)
 {
     auto scripted = nodes();
     for (ScriptedNode& each : scripted)
@@ -280,7 +280,7 @@ TEST_P(HarvestFailureOfType, atAPropertyKeepsTheNodesBeforeIt)
     EXPECT_EQ(result.standardError, Generic);
 }
 
-TEST_P(HarvestFailureOfType, byARefusedNameKeepsTheNodesBeforeIt)
+TEST_P(HarvestFailureOfTypeTest, ByARefusedNameKeepsTheNodesBeforeIt)
 {
     auto scripted = nodes();
     for (ScriptedNode& each : scripted)
@@ -293,7 +293,7 @@ TEST_P(HarvestFailureOfType, byARefusedNameKeepsTheNodesBeforeIt)
     EXPECT_EQ(result.standardError, Generic);
 }
 
-TEST_P(HarvestFailureOfType, aloneIsAHarvestOfNothing)
+TEST_P(HarvestFailureOfTypeTest, AloneIsAHarvestOfNothing)
 {
     ScriptedNode broken = node(GetParam(), "broken");
     broken.failsWhenRead = true;
@@ -303,11 +303,11 @@ TEST_P(HarvestFailureOfType, aloneIsAHarvestOfNothing)
     EXPECT_TRUE(result.sensors.empty());
 }
 
-INSTANTIATE_TEST_SUITE_P(EveryType, HarvestFailureOfType,
+INSTANTIATE_TEST_SUITE_P(EveryType, HarvestFailureOfTypeTest,
     ::testing::Values(Temperature, Voltage, Tachometer),
     [](const auto& test) { return std::to_string(static_cast<unsigned>(test.param)); });
 
-TEST(HarvestFailure, keepsRecordsThoughNoTypeSucceeds)
+TEST(HarvestFailureTest, KeepsRecordsThoughNoTypeSucceeds)
 {
     ScriptedNode broken = node(Temperature, "broken");
     broken.failsWhenRead = true;
@@ -317,7 +317,7 @@ TEST(HarvestFailure, keepsRecordsThoughNoTypeSucceeds)
     EXPECT_THAT(names(result.sensors), ElementsAre("t1"));
 }
 
-TEST(SetVector, throwsTheRefusalAndStaysOnTheNode)
+TEST(SetVectorTest, ThrowsTheRefusalAndStaysOnTheNode)
 {
     const ScriptedMachine machine({{Temperature, "/a", "", NodeReading{}}});
     Instrumentation instrumentation;
@@ -334,7 +334,7 @@ TEST(SetVector, throwsTheRefusalAndStaysOnTheNode)
     EXPECT_EQ(instrumentation.getPathToNode(), "/a");
 }
 
-TEST(SetVector, beginsAtTheNodeUnderTheCursor)
+TEST(SetVectorTest, BeginsAtTheNodeUnderTheCursor)
 {
     const ScriptedMachine machine({node(Temperature, "t1"), node(Temperature, "t2")});
     Instrumentation instrumentation;
@@ -346,7 +346,7 @@ TEST(SetVector, beginsAtTheNodeUnderTheCursor)
     EXPECT_FALSE(instrumentation);
 }
 
-TEST(CapabilitiesHarvest, appendsOneRecord)
+TEST(CapabilitiesHarvestTest, AppendsOneRecord)
 {
     std::vector<SensorEnabledLogCap> capabilities;
     EXPECT_FALSE(getSensorEnabledLogCapInstances(capabilities));
@@ -365,7 +365,7 @@ LogLine mark(const std::string& kind, const std::string& function, unsigned line
             "],Parameters List: " + parameters};
 }
 
-TEST(HarvestTrace, aHarvestIsMarkedAndSoIsEveryWalkInIt)
+TEST(HarvestTraceTest, AHarvestIsMarkedAndSoIsEveryWalkInIt)
 {
     const ScriptedMachine machine({node(Temperature, "t1"), node(Tachometer, "f1")});
     const LogCapture capture;
@@ -384,7 +384,7 @@ TEST(HarvestTrace, aHarvestIsMarkedAndSoIsEveryWalkInIt)
     EXPECT_EQ(lines[5], mark("EXITING", "getSensorInstances", 732, vector));
 }
 
-TEST(HarvestTrace, aRefusalLeavesTheWalkWithoutItsExitMark)
+TEST(HarvestTraceTest, ARefusalLeavesTheWalkWithoutItsExitMark)
 {
     const ScriptedMachine machine({{Temperature, "/a", "", NodeReading{}}});
     const LogCapture capture;
@@ -396,7 +396,7 @@ TEST(HarvestTrace, aRefusalLeavesTheWalkWithoutItsExitMark)
     EXPECT_THAT(marked, ElementsAre(668, 740, 732));
 }
 
-TEST(HarvestTrace, theCapabilitiesHarvestIsMarked)
+TEST(HarvestTraceTest, TheCapabilitiesHarvestIsMarked)
 {
     const LogCapture capture;
     std::vector<SensorEnabledLogCap> capabilities;

@@ -29,7 +29,7 @@ Value expected(const std::map<unsigned, Value>& rows, unsigned code, Value other
     return row == rows.end() ? otherwise : row->second;
 }
 
-TEST(Sensor, aNewRecordIsEmpty)
+TEST(SensorTest, ANewRecordIsEmpty)
 {
     Sensor sensor;
     EXPECT_EQ(sensor.getDeviceID(), "");
@@ -53,14 +53,14 @@ TEST(Sensor, aNewRecordIsEmpty)
     EXPECT_TRUE(sensor.getOperationalStatus().empty());
 }
 
-TEST(Sensor, beforeASensorTypeIsSetReadingsAreStoredUnscaled)
+TEST(SensorTest, BeforeASensorTypeIsSetReadingsAreStoredUnscaled)
 {
     Sensor sensor;
     EXPECT_TRUE(sensor.setCurrentReading(41.9));
     EXPECT_EQ(sensor.getCurrentReading(), 41);
 }
 
-TEST(Sensor, deviceIDIsStrippedWhenReadAndRefusedWhenEmpty)
+TEST(SensorTest, DeviceIDIsStrippedWhenReadAndRefusedWhenEmpty)
 {
     Sensor sensor;
     EXPECT_TRUE(sensor.setDeviceID("  CPU 1 Temp:/a/b "));
@@ -70,7 +70,7 @@ TEST(Sensor, deviceIDIsStrippedWhenReadAndRefusedWhenEmpty)
     EXPECT_TRUE(sensor.setDeviceID(" ")); // accepted: only the empty text is refused
 }
 
-TEST(Sensor, elementNameIsStrippedWhenReadAndRefusedWhenEmpty)
+TEST(SensorTest, ElementNameIsStrippedWhenReadAndRefusedWhenEmpty)
 {
     Sensor sensor;
     EXPECT_TRUE(sensor.setElementName(" CPU 1 "));
@@ -79,7 +79,7 @@ TEST(Sensor, elementNameIsStrippedWhenReadAndRefusedWhenEmpty)
     EXPECT_EQ(sensor.getElementName(), "");
 }
 
-TEST(Sensor, baseUnitsKeepTheirLow16Bits)
+TEST(SensorTest, BaseUnitsKeepTheirLow16Bits)
 {
     Sensor sensor;
     EXPECT_TRUE(sensor.setBaseUnits(65536 + 19));
@@ -88,7 +88,7 @@ TEST(Sensor, baseUnitsKeepTheirLow16Bits)
     EXPECT_EQ(sensor.getBaseUnits(), 0);
 }
 
-TEST(Sensor, aRateIsRefusedWhenItsLow16BitsAreZeroAndAlwaysReadAsZero)
+TEST(SensorTest, ARateIsRefusedWhenItsLow16BitsAreZeroAndAlwaysReadAsZero)
 {
     Sensor sensor;
     EXPECT_FALSE(sensor.setRateUnits(0));
@@ -98,14 +98,14 @@ TEST(Sensor, aRateIsRefusedWhenItsLow16BitsAreZeroAndAlwaysReadAsZero)
     EXPECT_EQ(sensor.getRateUnits(), 0);
 }
 
-TEST(Sensor, unitModifierIsStoredAsItIs)
+TEST(SensorTest, UnitModifierIsStoredAsItIs)
 {
     Sensor sensor;
     EXPECT_TRUE(sensor.setUnitModifier(-9));
     EXPECT_EQ(sensor.getUnitModifier(), -9);
 }
 
-TEST(Sensor, eachSensorTypeCodeGivesItsTypeScaleAndModifier)
+TEST(SensorTest, EachSensorTypeCodeGivesItsTypeScaleAndModifier)
 {
     struct Row {
         std::uint16_t type;
@@ -128,7 +128,7 @@ TEST(Sensor, eachSensorTypeCodeGivesItsTypeScaleAndModifier)
     }
 }
 
-TEST(Sensor, eachNodeStatusGivesItsEnabledState)
+TEST(SensorTest, EachNodeStatusGivesItsEnabledState)
 {
     const std::map<unsigned, int> rows = {{0, 0}, {1, 2}, {12, 6}, {16, 3}};
     for (const unsigned code : AllCodes) {
@@ -138,7 +138,7 @@ TEST(Sensor, eachNodeStatusGivesItsEnabledState)
     }
 }
 
-TEST(Sensor, eachCodeGivesItsRequestedState)
+TEST(SensorTest, EachCodeGivesItsRequestedState)
 {
     const std::map<unsigned, int> rows = {
         {0, 0}, {1, 2}, {3, 4}, {8, 9}, {9, 10}, {12, 4}, {16, 3}};
@@ -149,7 +149,7 @@ TEST(Sensor, eachCodeGivesItsRequestedState)
     }
 }
 
-TEST(Sensor, eachNodeStatusGivesItsHealthStateAndStatus)
+TEST(SensorTest, EachNodeStatusGivesItsHealthStateAndStatus)
 {
     using Health = std::pair<int, std::string>;
     const std::map<unsigned, Health> rows = {{0, {0, "UnKnown"}}, {20, {10, "Error"}},
@@ -167,7 +167,7 @@ const std::map<unsigned, std::string> StateLabelRows = {{1, "Normal"}, {12, "Off
     {16, "Disabled"}, {21, "Warning"}, {22, "WarningLow"}, {23, "WarningHigh"}, {24, "Critical"},
     {25, "CriticalLow"}, {26, "CriticalHigh"}};
 
-TEST(Sensor, eachNodeStatusGivesItsCurrentState)
+TEST(SensorTest, EachNodeStatusGivesItsCurrentState)
 {
     for (const unsigned code : AllCodes) {
         Sensor sensor;
@@ -177,7 +177,7 @@ TEST(Sensor, eachNodeStatusGivesItsCurrentState)
     }
 }
 
-TEST(Sensor, eachNodeStatusGivesItsOperationalStatus)
+TEST(SensorTest, EachNodeStatusGivesItsOperationalStatus)
 {
     const std::map<unsigned, int> rows = {
         {0, 0}, {1, 2}, {2, 8}, {3, 9}, {8, 15}, {10, 10}, {13, 13}, {17, 12}, {20, 5}};
@@ -190,7 +190,7 @@ TEST(Sensor, eachNodeStatusGivesItsOperationalStatus)
     }
 }
 
-TEST(Sensor, operationalStatusGrowsWithEverySetting)
+TEST(SensorTest, OperationalStatusGrowsWithEverySetting)
 {
     Sensor sensor;
     sensor.setOperationalStatus(1);
@@ -209,7 +209,7 @@ Labels withFixedLabels(Labels labels)
     return labels;
 }
 
-TEST(Sensor, possibleStatesAreTheirLabelsAndThenTheFixedOnes)
+TEST(SensorTest, PossibleStatesAreTheirLabelsAndThenTheFixedOnes)
 {
     Sensor sensor;
     EXPECT_TRUE(sensor.setPossibleStates({1, 99, 25, 65536 + 25}));
@@ -217,7 +217,7 @@ TEST(Sensor, possibleStatesAreTheirLabelsAndThenTheFixedOnes)
         withFixedLabels({"Normal", "Unknown", "CriticalLow", "Unknown"}));
 }
 
-TEST(Sensor, eachPossibleStateHasTheLabelOfTheCurrentState)
+TEST(SensorTest, EachPossibleStateHasTheLabelOfTheCurrentState)
 {
     Sensor sensor;
     sensor.setPossibleStates(AllCodes);
@@ -227,7 +227,7 @@ TEST(Sensor, eachPossibleStateHasTheLabelOfTheCurrentState)
     EXPECT_EQ(sensor.getPossibleStates(), withFixedLabels(labels));
 }
 
-TEST(Sensor, possibleStatesGrowWithEveryReadingAndAreReplacedBySetting)
+TEST(SensorTest, PossibleStatesGrowWithEveryReadingAndAreReplacedBySetting)
 {
     Sensor sensor;
     EXPECT_EQ(sensor.getPossibleStates(), FixedLabels);
@@ -238,7 +238,7 @@ TEST(Sensor, possibleStatesGrowWithEveryReadingAndAreReplacedBySetting)
     EXPECT_EQ(sensor.getPossibleStates(), FixedLabels);
 }
 
-TEST(Sensor, thresholdListsGrowWithEveryReadingEachOnItsOwn)
+TEST(SensorTest, ThresholdListsGrowWithEveryReadingEachOnItsOwn)
 {
     Sensor sensor;
     EXPECT_EQ(sensor.getSupportedThresholds(), (Codes{0, 1, 2, 3, 4, 5}));
@@ -247,7 +247,7 @@ TEST(Sensor, thresholdListsGrowWithEveryReadingEachOnItsOwn)
     EXPECT_EQ(sensor.getSettableThresholds().size(), 12U);
 }
 
-TEST(Sensor, aCopyGrowsOnItsOwn)
+TEST(SensorTest, ACopyGrowsOnItsOwn)
 {
     Sensor sensor;
     Sensor copy = sensor;
@@ -318,7 +318,7 @@ const std::vector<ScaledField> ScaledFields = {
     {"UpperThresholdFatal", &Sensor::setUpperThresholdFatal, &Sensor::getUpperThresholdFatal},
 };
 
-TEST(Sensor, everyScaledFieldIsMultipliedInExtendedPrecisionAndCut)
+TEST(SensorTest, EveryScaledFieldIsMultipliedInExtendedPrecisionAndCut)
 {
     for (const ScaledField& field : ScaledFields)
         for (const Scaling& scaling : Scalings) {
@@ -330,7 +330,7 @@ TEST(Sensor, everyScaledFieldIsMultipliedInExtendedPrecisionAndCut)
         }
 }
 
-TEST(Sensor, everyScaledFieldIsStoredApartFromTheOthers)
+TEST(SensorTest, EveryScaledFieldIsStoredApartFromTheOthers)
 {
     Sensor sensor;
     double value = 1.0;

@@ -44,45 +44,45 @@ std::set<std::string> neededLibraries(const std::string& name)
     return libraries;
 }
 
-class InstalledBinary : public testing::TestWithParam<const char*> {};
+class InstalledBinaryTest : public testing::TestWithParam<const char*> {};
 
-TEST_P(InstalledBinary, hasAllTheLibrariesItNeeds)
+TEST_P(InstalledBinaryTest, HasAllTheLibrariesItNeeds)
 {
     const std::string libraries = outputOf("ldd '" + fileOf(GetParam()) + "' 2>&1");
     EXPECT_THAT(libraries, HasSubstr("libc.so"));
     EXPECT_THAT(libraries, Not(HasSubstr("not found")));
 }
 
-TEST_P(InstalledBinary, hasAddressesThatAreFixedAtTheStartAndReadOnlyThen)
+TEST_P(InstalledBinaryTest, HasAddressesThatAreFixedAtTheStartAndReadOnlyThen)
 {
     EXPECT_THAT(readelf("--program-headers", GetParam()), HasSubstr("GNU_RELRO"));
     const std::string dynamic = readelf("--dynamic", GetParam());
     EXPECT_TRUE(std::regex_search(dynamic, std::regex(R"(\(FLAGS_1\) +Flags: .*\bNOW\b)")));
 }
 
-TEST_P(InstalledBinary, canLieAnywhereInMemory)
+TEST_P(InstalledBinaryTest, CanLieAnywhereInMemory)
 {
     EXPECT_THAT(readelf("--file-header", GetParam()), HasSubstr("DYN ("));
     EXPECT_THAT(readelf("--dynamic", GetParam()), Not(HasSubstr("TEXTREL")));
 }
 
-TEST_P(InstalledBinary, hasAStackThatIsGuardedAndNotExecutable)
+TEST_P(InstalledBinaryTest, HasAStackThatIsGuardedAndNotExecutable)
 {
     EXPECT_THAT(readelf("--dyn-syms", GetParam()), HasSubstr("__stack_chk_fail"));
     EXPECT_TRUE(std::regex_search(readelf("--program-headers", GetParam()),
         std::regex(R"(GNU_STACK +0x\w+ 0x\w+ 0x\w+ 0x\w+ 0x\w+ RW +)")));
 }
 
-TEST_P(InstalledBinary, isToldNoFoldersOfLibraries)
+TEST_P(InstalledBinaryTest, IsToldNoFoldersOfLibraries)
 {
     EXPECT_THAT(readelf("--dynamic", GetParam()), Not(HasSubstr("RPATH")));
     EXPECT_THAT(readelf("--dynamic", GetParam()), Not(HasSubstr("RUNPATH")));
 }
 
-INSTANTIATE_TEST_SUITE_P(InstalledBinaries, InstalledBinary,
+INSTANTIATE_TEST_SUITE_P(InstalledBinaries, InstalledBinaryTest,
     testing::Values("bin/sensorctl", sensorLibrary, systemLibrary));
 
-TEST(InstalledLibrary, exportsItsFactoriesAndNothingElse)
+TEST(InstalledLibraryTest, ExportsItsFactoriesAndNothingElse)
 {
     EXPECT_THAT(exportedNames(fileOf(sensorLibrary)),
         UnorderedElementsAre("SensorProfileProvider_Create_InstanceMI",
@@ -96,7 +96,7 @@ TEST(InstalledLibrary, exportsItsFactoriesAndNothingElse)
 }
 
 // An object manager pays for every library that a provider draws in.
-TEST(InstalledLibrary, needsNothingOfTheServer)
+TEST(InstalledLibraryTest, NeedsNothingOfTheServer)
 {
     const std::set<std::string> common = {
         "libc", "libgcc_s", "libstdc++", "libm", "ld-linux-x86-64", "ld-linux-aarch64"};

@@ -30,13 +30,13 @@ std::vector<std::string> offersFor(const std::vector<std::string>& words)
     return linesOf(ended.out);
 }
 
-TEST(Completion, offersCommands)
+TEST(CompletionTest, OffersCommands)
 {
     EXPECT_THAT(offersFor({""}), testing::IsSupersetOf({"list", "get", "walk", "record"}));
     EXPECT_THAT(offersFor({"re"}), ElementsAre("record"));
 }
 
-TEST(Completion, offersTheOptionsOfTheCommand)
+TEST(CompletionTest, OffersTheOptionsOfTheCommand)
 {
     EXPECT_THAT(offersFor({"list", "--"}),
         testing::UnorderedElementsAre("--help", "--model", "--provider", "--json", "--color"));
@@ -44,7 +44,7 @@ TEST(Completion, offersTheOptionsOfTheCommand)
     EXPECT_THAT(offersFor({"--v"}), ElementsAre("--version"));
 }
 
-TEST(Completion, offersValues)
+TEST(CompletionTest, OffersValues)
 {
     EXPECT_THAT(offersFor({"list", "--color", "a"}), ElementsAre("auto", "always"));
     EXPECT_THAT(offersFor({"list", "ZUMLO_S"}), Each(StartsWith("ZUMLO_Sensor")));
@@ -54,7 +54,7 @@ TEST(Completion, offersValues)
     EXPECT_THAT(offersFor({"serve", "--user", "roo"}), Contains("root"));
 }
 
-TEST(Completion, offersNoFilesForOtherThings)
+TEST(CompletionTest, OffersNoFilesForOtherThings)
 {
     EXPECT_THAT(offersFor({"get", "/etc/host"}), testing::IsEmpty());
     EXPECT_THAT(offersFor({"get", "--json", "/etc/host"}), testing::IsEmpty());

@@ -50,7 +50,7 @@ const std::vector<std::string> toolFiles = {"bin/sensorctl", "etc/sensor-profile
     "share/sensor-profile/demo-model.json", "share/sensor-profile/host.mof",
     "share/sensor-profile/interop.mof"};
 
-TEST(Installed, areTheProviderAndTheTool)
+TEST(InstalledTest, AreTheProviderAndTheTool)
 {
     std::vector<std::string> all = providerFiles;
     all.insert(all.end(), toolFiles.begin(), toolFiles.end());
@@ -59,14 +59,14 @@ TEST(Installed, areTheProviderAndTheTool)
     EXPECT_THAT(filesBelow(movedInstallation()), ElementsAreArray(all));
 }
 
-TEST(Installed, providerCanBeHadAlone)
+TEST(InstalledTest, ProviderCanBeHadAlone)
 {
     const TemporaryFolder folder;
     install({"--component", "provider", "--prefix", folder.path().string()});
     EXPECT_THAT(filesBelow(folder.path()), ElementsAreArray(providerFiles));
 }
 
-TEST(Installed, toolShowsTheDemonstration)
+TEST(InstalledTest, ToolShowsTheDemonstration)
 {
     const Ended ended = run({"list", "--model", fileOf("share/sensor-profile/demo-model.json")},
         installedTool({{"COLUMNS", "80"}}));
@@ -76,7 +76,7 @@ TEST(Installed, toolShowsTheDemonstration)
         ended.out, contentOf(SENSOR_PROFILE_SOURCE_DIR "/tests/data/tools/demonstration-list.txt"));
 }
 
-TEST(Installed, toolFindsTheCatalogs)
+TEST(InstalledTest, ToolFindsTheCatalogs)
 {
     for (const auto& [language, text] :
         std::map<std::string, std::string>{{"de_DE.UTF-8", "Numerischer Sensor"},
@@ -90,7 +90,7 @@ TEST(Installed, toolFindsTheCatalogs)
     }
 }
 
-TEST(Installed, toolFollowsTheAssociationsThroughBothLibraries)
+TEST(InstalledTest, ToolFollowsTheAssociationsThroughBothLibraries)
 {
     const Ended ended = run({"walk", "--model", fileOf("share/sensor-profile/demo-model.json")},
         installedTool({{"LC_ALL", "C.UTF-8"}}));
@@ -100,7 +100,7 @@ TEST(Installed, toolFollowsTheAssociationsThroughBothLibraries)
 }
 
 // Distributions differ in the name of the folder of libraries.
-TEST(Installed, librariesAreFoundInEveryFolderOfLibraries)
+TEST(InstalledTest, LibrariesAreFoundInEveryFolderOfLibraries)
 {
     const TemporaryFolder folder;
     const fs::path prefix = folder.path() / "usr";
@@ -129,7 +129,7 @@ TEST(Installed, librariesAreFoundInEveryFolderOfLibraries)
 }
 
 // The service, installed for a prefix below another root.
-class InstalledService : public testing::Test {
+class InstalledServiceTest : public testing::Test {
 protected:
     void installFor(const std::string& prefix) const
     {
@@ -156,7 +156,7 @@ protected:
         contentOf(SENSOR_PROFILE_SOURCE_DIR "/packaging/sensor-profile.service");
 };
 
-TEST_F(InstalledService, belowUsrIsTheSystems)
+TEST_F(InstalledServiceTest, BelowUsrIsTheSystems)
 {
     installFor("/usr");
     EXPECT_THAT(files(), ElementsAre("/etc/sensor-profile/serve.conf",
@@ -166,7 +166,7 @@ TEST_F(InstalledService, belowUsrIsTheSystems)
     EXPECT_EQ(content("/lib/systemd/system/sensor-profile.service"), shippedUnit_);
 }
 
-TEST_F(InstalledService, hasThePathsOfItsPrefix)
+TEST_F(InstalledServiceTest, HasThePathsOfItsPrefix)
 {
     for (const auto& [prefix, settings] :
         std::map<std::string, std::string>{{"/usr/local", "/usr/local/etc/sensor-profile"},
@@ -184,7 +184,7 @@ TEST_F(InstalledService, hasThePathsOfItsPrefix)
 }
 
 // The unit hides homes from the service.
-TEST_F(InstalledService, isNotInstalledWhereItCannotStart)
+TEST_F(InstalledServiceTest, IsNotInstalledWhereItCannotStart)
 {
     for (const char* const prefix : {"/home/somebody/sensors", "/root/sensors", "/root"})
         installFor(prefix);
@@ -192,7 +192,7 @@ TEST_F(InstalledService, isNotInstalledWhereItCannotStart)
 }
 
 // What a unit would have to quote.
-TEST_F(InstalledService, isNotInstalledBelowAnOddPrefix)
+TEST_F(InstalledServiceTest, IsNotInstalledBelowAnOddPrefix)
 {
     for (const char* const prefix : {"/srv/our sensors", "/srv/100%", "/srv/$HOME"})
         installFor(prefix);
@@ -200,7 +200,7 @@ TEST_F(InstalledService, isNotInstalledBelowAnOddPrefix)
     EXPECT_TRUE(fs::exists(folder_.path() / "srv/our sensors/bin/sensorctl"));
 }
 
-TEST_F(InstalledService, hasWholePathsBelowARelativePrefix)
+TEST_F(InstalledServiceTest, HasWholePathsBelowARelativePrefix)
 {
     const std::string prefix = folder_.path().string() + "/relative";
     EXPECT_THAT(outputOf("cd '" + folder_.path().string() +
@@ -213,7 +213,7 @@ TEST_F(InstalledService, hasWholePathsBelowARelativePrefix)
 }
 
 // Several can install from one build at the same time, and others than its owner can.
-TEST_F(InstalledService, isNotMadeInTheBuild)
+TEST_F(InstalledServiceTest, IsNotMadeInTheBuild)
 {
     const auto inTheBuild = [] {
         std::map<std::string, fs::file_time_type> times;
@@ -227,7 +227,7 @@ TEST_F(InstalledService, isNotMadeInTheBuild)
     EXPECT_EQ(inTheBuild(), before);
 }
 
-TEST_F(InstalledService, seesTheTemporaryFolderThatItIsTriedIn)
+TEST_F(InstalledServiceTest, SeesTheTemporaryFolderThatItIsTriedIn)
 {
     installFor("/tmp/sensors");
     EXPECT_THAT(content("/tmp/sensors/lib/systemd/system/sensor-profile.service"),
@@ -235,7 +235,7 @@ TEST_F(InstalledService, seesTheTemporaryFolderThatItIsTriedIn)
 }
 
 // By a script of its own: the build's list is that of whichever installation was the last.
-TEST_F(InstalledService, isInTheListOfWhatIsInstalled)
+TEST_F(InstalledServiceTest, IsInTheListOfWhatIsInstalled)
 {
     const std::string script = folder_.write("script.cmake",
         "include(\"" SENSOR_PROFILE_BINARY_DIR "/packaging/cmake_install.cmake\")\n"
@@ -255,7 +255,7 @@ TEST_F(InstalledService, isInTheListOfWhatIsInstalled)
     EXPECT_THAT(installed, testing::Contains("/lib/systemd/system/sensor-profile.service"));
 }
 
-TEST_F(InstalledService, hasAUnitThatSystemdUnderstands)
+TEST_F(InstalledServiceTest, HasAUnitThatSystemdUnderstands)
 {
     const std::string prefix = folder_.path().string();
     install({"--component", "tool", "--prefix", prefix});
@@ -266,7 +266,7 @@ TEST_F(InstalledService, hasAUnitThatSystemdUnderstands)
 
 // By systemd's own measure, in tenths: what is left is that it has a network, sees the host's
 // name, and lets the administrator choose whom to answer.
-TEST_F(InstalledService, isShutInAsFarAsItCanBe)
+TEST_F(InstalledServiceTest, IsShutInAsFarAsItCanBe)
 {
     const std::string verdict = outputOf(
         "systemd-analyze security --offline=yes --threshold=12 --no-pager "
@@ -274,7 +274,7 @@ TEST_F(InstalledService, isShutInAsFarAsItCanBe)
     EXPECT_THAT(verdict, testing::EndsWith("passed\n"));
 }
 
-TEST_F(InstalledService, leavesTheSettingsOfTheAdministrator)
+TEST_F(InstalledServiceTest, LeavesTheSettingsOfTheAdministrator)
 {
     installFor("/usr/local");
     folder_.write("usr/local/etc/sensor-profile/serve.conf", "port = 7000\n");
@@ -282,7 +282,7 @@ TEST_F(InstalledService, leavesTheSettingsOfTheAdministrator)
     EXPECT_EQ(content("/usr/local/etc/sensor-profile/serve.conf"), "port = 7000\n");
 }
 
-TEST(Installed, nothingNamesTheBuildTheSourcesOrTheFirstPrefix)
+TEST(InstalledTest, NothingNamesTheBuildTheSourcesOrTheFirstPrefix)
 {
     for (const std::string& name : filesBelow(movedInstallation())) {
         if (name.ends_with(".service") || name.ends_with(".conf"))

@@ -32,9 +32,9 @@ std::set<std::string> longOptions(const std::string& text)
     return options;
 }
 
-class ManualPage : public testing::TestWithParam<const char*> {};
+class ManualPageTest : public testing::TestWithParam<const char*> {};
 
-TEST_P(ManualPage, isFreeOfWarnings)
+TEST_P(ManualPageTest, IsFreeOfWarnings)
 {
     const std::string file = folder + GetParam();
     EXPECT_EQ(outputOf("mandoc -T lint -W warning '" + file + "' 2>&1"), "");
@@ -43,7 +43,7 @@ TEST_P(ManualPage, isFreeOfWarnings)
         "");
 }
 
-INSTANTIATE_TEST_SUITE_P(ManualPages, ManualPage,
+INSTANTIATE_TEST_SUITE_P(ManualPages, ManualPageTest,
     testing::Values(
         "sensorctl.1", "sensor-profile-model.5", "sensor-profile.7", "sensor-profile-register.8"));
 
@@ -58,7 +58,7 @@ std::map<std::string, std::string> helpByCommand()
     return texts;
 }
 
-TEST(ManualOfTheTool, hasEveryCommandAndTheOptionsThereAre)
+TEST(ManualOfTheToolTest, HasEveryCommandAndTheOptionsThereAre)
 {
     const std::string page = rendered("sensorctl.1");
     std::set<std::string> options;
@@ -70,7 +70,7 @@ TEST(ManualOfTheTool, hasEveryCommandAndTheOptionsThereAre)
     EXPECT_EQ(longOptions(page), options);
 }
 
-TEST(ManualOfTheTool, hasTheDefaultsOfTheServer)
+TEST(ManualOfTheToolTest, HasTheDefaultsOfTheServer)
 {
     static const std::regex withDefault(R"((--[a-z-]+) [A-Z]+=(\d+))");
     const std::string page = rendered("sensorctl.1");
@@ -82,7 +82,7 @@ TEST(ManualOfTheTool, hasTheDefaultsOfTheServer)
 }
 
 // What the file shows as settings are options, the ports with the values they have without it.
-TEST(SettingsOfTheService, areOptionsOfTheServer)
+TEST(SettingsOfTheServiceTest, AreOptionsOfTheServer)
 {
     static const std::regex setting("#([a-z-]+) = (.*)");
     const std::string help = run({"serve", "--help"}).out;
@@ -105,14 +105,14 @@ TEST(SettingsOfTheService, areOptionsOfTheServer)
     EXPECT_GE(settings, 7);
 }
 
-TEST(ManualOfRegistering, hasTheOptionsOfTheCommand)
+TEST(ManualOfRegisteringTest, HasTheOptionsOfTheCommand)
 {
     const Ended help = run(
         {"--help"}, {.program = (movedInstallation() / "sbin/sensor-profile-register").string()});
     EXPECT_EQ(longOptions(rendered("sensor-profile-register.8")), longOptions(help.out));
 }
 
-TEST(ManualOfTheModel, hasTheMembersOfTheSchema)
+TEST(ManualOfTheModelTest, HasTheMembersOfTheSchema)
 {
     const auto schema = nlohmann::json::parse(
         contentOf(SENSOR_PROFILE_SOURCE_DIR "/schema/sensor-profile-model.schema.json"));
@@ -142,7 +142,7 @@ std::vector<unsigned> codesIn(const std::string& list)
     return codes;
 }
 
-TEST(ManualOfTheModel, hasTheStatusesOfTheOperationsPage)
+TEST(ManualOfTheModelTest, HasTheStatusesOfTheOperationsPage)
 {
     std::vector<unsigned> expected;
     for (const auto& [status, row] : rowsOfStatuses)
@@ -169,14 +169,14 @@ nlohmann::json shownWith(unsigned status)
     return document["instances"][0]["properties"];
 }
 
-TEST(ManualOfTheClasses, LinksToTheOperationsPage)
+TEST(ManualOfTheClassesTest, LinksToTheOperationsPage)
 {
     EXPECT_THAT(rendered("sensor-profile.7"),
         HasSubstr(" /usr/share/doc/sensor-profile-provider/operations.md"));
 }
 
 // Each state's row in the tables, against what a sensor with such a status shows.
-TEST(OperationsPage, hasTheStatesThatSensorsShow)
+TEST(OperationsPageTest, HasTheStatesThatSensorsShow)
 {
     const std::string page = contentOf(SENSOR_PROFILE_SOURCE_DIR "/docs/operations.md");
     for (const auto& [status, row] : rowsOfStatuses) {
@@ -206,7 +206,7 @@ std::string partOf(const std::string& page, const std::string& start, const std:
 }
 
 // Every property that is published is told of where its class is.
-TEST(OperationsPage, tellsOfEveryProperty)
+TEST(OperationsPageTest, TellsOfEveryProperty)
 {
     const std::map<std::string, std::string> starts = {{"ZUMLO_NumericSensor", "\nA sensor, "},
         {"ZUMLO_ComputerSystem", "\nThe computer, "},

@@ -16,7 +16,7 @@ using testing::Not;
 using namespace Testing;
 namespace fs = std::filesystem;
 
-class OpenPegasus : public RegisterTest {
+class OpenPegasusTest : public RegisterTest {
 protected:
     OpenPegasus() : RegisterTest({"cimmof", "cimprovider"}) {}
 
@@ -31,7 +31,7 @@ protected:
     const std::string registrationStep_ = "cimmof -n root/PG_InterOp " + registration_;
 };
 
-TEST_F(OpenPegasus, registersTheClassesThenTheProviders)
+TEST_F(OpenPegasusTest, RegistersTheClassesThenTheProviders)
 {
     EXPECT_THAT(mustRun({"register"}), HasSubstr("Registered in root/cimv2."));
     EXPECT_THAT(
@@ -39,7 +39,7 @@ TEST_F(OpenPegasus, registersTheClassesThenTheProviders)
     EXPECT_THAT(modules(), ElementsAre("SensorProfileModule", "SensorProfileComputerSystemModule"));
 }
 
-TEST_F(OpenPegasus, replacesWhatIsRegistered)
+TEST_F(OpenPegasusTest, ReplacesWhatIsRegistered)
 {
     mustRun({"register"});
     calls();
@@ -51,7 +51,7 @@ TEST_F(OpenPegasus, replacesWhatIsRegistered)
     EXPECT_THAT(modules(), ElementsAre("SensorProfileModule", "SensorProfileComputerSystemModule"));
 }
 
-TEST_F(OpenPegasus, leavesTheModulesOfOthersAlone)
+TEST_F(OpenPegasusTest, LeavesTheModulesOfOthersAlone)
 {
     folder_.write("modules", "OtherModule\nSensorProfileModule2\nMySensorProfileModule\n");
     mustRun({"register"});
@@ -60,7 +60,7 @@ TEST_F(OpenPegasus, leavesTheModulesOfOthersAlone)
         modules(), ElementsAre("OtherModule", "SensorProfileModule2", "MySensorProfileModule"));
 }
 
-TEST_F(OpenPegasus, removesTheProviders)
+TEST_F(OpenPegasusTest, RemovesTheProviders)
 {
     mustRun({"register"});
     calls();
@@ -71,7 +71,7 @@ TEST_F(OpenPegasus, removesTheProviders)
 }
 
 // It cannot be seen which namespace is registered: what somebody takes for the old one may be new.
-TEST_F(OpenPegasus, removesFromNoSingleNamespace)
+TEST_F(OpenPegasusTest, RemovesFromNoSingleNamespace)
 {
     mustRun({"register", "--namespace", "root/old"});
     mustRun({"register", "--namespace", "root/new"});
@@ -83,13 +83,13 @@ TEST_F(OpenPegasus, removesFromNoSingleNamespace)
     EXPECT_EQ(modules().size(), 2U);
 }
 
-TEST_F(OpenPegasus, removesNothingWhereNothingIsRegistered)
+TEST_F(OpenPegasusTest, RemovesNothingWhereNothingIsRegistered)
 {
     EXPECT_THAT(mustRun({"remove"}), HasSubstr("nothing was changed"));
     EXPECT_THAT(calls(), ElementsAre("cimprovider -l"));
 }
 
-TEST_F(OpenPegasus, linksTheLibrariesIntoTheFolderOfProviders)
+TEST_F(OpenPegasusTest, LinksTheLibrariesIntoTheFolderOfProviders)
 {
     EXPECT_THAT(mustRun({"register"}), Not(HasSubstr("must look")));
     for (const char* const name : {"libSensorProfileProvider.so", "libComputerSystemProvider.so"})
@@ -102,7 +102,7 @@ TEST_F(OpenPegasus, linksTheLibrariesIntoTheFolderOfProviders)
     EXPECT_THAT(links(), IsEmpty());
 }
 
-TEST_F(OpenPegasus, refusesToTakeThePlaceOfAnotherLibrary)
+TEST_F(OpenPegasusTest, RefusesToTakeThePlaceOfAnotherLibrary)
 {
     folder_.write("providers/libComputerSystemProvider.so", "another one");
     const Ended ended = runRegister({"register"});
@@ -119,7 +119,7 @@ TEST_F(OpenPegasus, refusesToTakeThePlaceOfAnotherLibrary)
     EXPECT_THAT(links(), ElementsAre("libComputerSystemProvider.so"));
 }
 
-TEST_F(OpenPegasus, registersTheSensorsWithoutTheComputerSystem)
+TEST_F(OpenPegasusTest, RegistersTheSensorsWithoutTheComputerSystem)
 {
     mustRun({"register"});
     calls();
@@ -138,7 +138,7 @@ TEST_F(OpenPegasus, registersTheSensorsWithoutTheComputerSystem)
             Not(HasSubstr("ComputerSystemProvider")), testing::EndsWith("};\n\n")));
 }
 
-TEST_F(OpenPegasus, registersInAnotherNamespace)
+TEST_F(OpenPegasusTest, RegistersInAnotherNamespace)
 {
     EXPECT_THAT(mustRun({"register", "--namespace=root/sensors_2"}),
         HasSubstr("Registered in root/sensors_2."));
@@ -151,7 +151,7 @@ TEST_F(OpenPegasus, registersInAnotherNamespace)
     EXPECT_EQ(contentOf(path("sensor-profile-registration.mof")), document);
 }
 
-TEST_F(OpenPegasus, dryRunPrintsTheStepsAndTakesNone)
+TEST_F(OpenPegasusTest, DryRunPrintsTheStepsAndTakesNone)
 {
     const Lines planned = linesOf(mustRun({"register", "--dry-run"}));
     EXPECT_THAT(calls(), ElementsAre("cimprovider -l"));
@@ -169,7 +169,7 @@ TEST_F(OpenPegasus, dryRunPrintsTheStepsAndTakesNone)
 }
 
 // Where the machine has a folder of providers for it, they are linked there.
-TEST_F(OpenPegasus, withoutAFolderTheMachinesIsTaken)
+TEST_F(OpenPegasusTest, WithoutAFolderTheMachinesIsTaken)
 {
     std::string expected = "must look for provider libraries in " + library();
     for (const std::string known : {"/usr/lib/Pegasus/providers", "/usr/lib64/Pegasus/providers"})
@@ -178,7 +178,7 @@ TEST_F(OpenPegasus, withoutAFolderTheMachinesIsTaken)
     EXPECT_THAT(plan({"register"}), HasSubstr(expected));
 }
 
-TEST_F(OpenPegasus, aServerThatDoesNotAnswerIsAFailureBeforeAnyStep)
+TEST_F(OpenPegasusTest, AServerThatDoesNotAnswerIsAFailureBeforeAnyStep)
 {
     failAt(1);
     for (const char* const action : {"register", "remove"}) {
@@ -191,9 +191,9 @@ TEST_F(OpenPegasus, aServerThatDoesNotAnswerIsAFailureBeforeAnyStep)
     }
 }
 
-class EveryRegistrationStepOfOpenPegasus : public EveryStepOf<OpenPegasus> {};
+class EveryRegistrationStepOfOpenPegasusTest : public EveryStepOf<OpenPegasus> {};
 
-TEST_P(EveryRegistrationStepOfOpenPegasus, canFailAndBeUndone)
+TEST_P(EveryRegistrationStepOfOpenPegasusTest, CanFailAndBeUndone)
 {
     folder_.write("modules", "SensorProfileModule\nSensorProfileComputerSystemModule\n");
     const std::string message = failing({"register"},
@@ -214,11 +214,11 @@ TEST_P(EveryRegistrationStepOfOpenPegasus, canFailAndBeUndone)
 }
 
 INSTANTIATE_TEST_SUITE_P(
-    Steps, EveryRegistrationStepOfOpenPegasus, testing::Range<std::size_t>(0, 7));
+    Steps, EveryRegistrationStepOfOpenPegasusTest, testing::Range<std::size_t>(0, 7));
 
-class EveryRemovalStepOfOpenPegasus : public EveryStepOf<OpenPegasus> {};
+class EveryRemovalStepOfOpenPegasusTest : public EveryStepOf<OpenPegasus> {};
 
-TEST_P(EveryRemovalStepOfOpenPegasus, canFailAndBeRepeated)
+TEST_P(EveryRemovalStepOfOpenPegasusTest, CanFailAndBeRepeated)
 {
     mustRun({"register"});
     const std::string message =
@@ -233,9 +233,10 @@ TEST_P(EveryRemovalStepOfOpenPegasus, canFailAndBeRepeated)
     EXPECT_THAT(links(), IsEmpty());
 }
 
-INSTANTIATE_TEST_SUITE_P(Steps, EveryRemovalStepOfOpenPegasus, testing::Range<std::size_t>(0, 4));
+INSTANTIATE_TEST_SUITE_P(
+    Steps, EveryRemovalStepOfOpenPegasusTest, testing::Range<std::size_t>(0, 4));
 
-TEST_F(OpenPegasus, anUndoneRemovalIsARegistrationAsItWas)
+TEST_F(OpenPegasusTest, AnUndoneRemovalIsARegistrationAsItWas)
 {
     mustRun({"register", "--without-computer-system"});
     calls();
@@ -248,7 +249,7 @@ TEST_F(OpenPegasus, anUndoneRemovalIsARegistrationAsItWas)
 }
 
 // A command that hangs is ended, too.
-TEST_F(OpenPegasus, aSignalDuringAStepIsAFailureOfIt)
+TEST_F(OpenPegasusTest, ASignalDuringAStepIsAFailureOfIt)
 {
     folder_.write("hang-at", "2");
     const std::string script = "env --default-signal=INT \"$@\" &\n"
@@ -269,7 +270,7 @@ TEST_F(OpenPegasus, aSignalDuringAStepIsAFailureOfIt)
 }
 
 // Where the name alone leads to it, that is how it is told to be typed.
-TEST_F(OpenPegasus, adviceNamesTheCommandAsItIsFound)
+TEST_F(OpenPegasusTest, AdviceNamesTheCommandAsItIsFound)
 {
     fs::create_symlink(program_, path("bin/sensor-profile-register"));
     failAt(2);
@@ -279,7 +280,7 @@ TEST_F(OpenPegasus, adviceNamesTheCommandAsItIsFound)
         HasSubstr("To undo it: sensor-profile-register remove "));
 }
 
-TEST_F(OpenPegasus, aFirstRegistrationThatFailsSpeaksOfNoEarlierOne)
+TEST_F(OpenPegasusTest, AFirstRegistrationThatFailsSpeaksOfNoEarlierOne)
 {
     failAt(2);
     EXPECT_THAT(runRegister({"register"}).err, Not(HasSubstr("registered before")));

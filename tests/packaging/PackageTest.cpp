@@ -17,7 +17,7 @@ using namespace Testing;
 
 const std::string packaging = SENSOR_PROFILE_SOURCE_DIR "/packaging/";
 
-class Packages : public testing::Test {
+class PackagesTest : public testing::Test {
 protected:
     // Made by somebody who is cautious.
     static void SetUpTestSuite()
@@ -43,7 +43,7 @@ protected:
     }
 };
 
-TEST_F(Packages, haveNoErrorsForLintian)
+TEST_F(PackagesTest, HaveNoErrorsForLintian)
 {
     const std::string complaints =
         outputOf("lintian --allow-root --fail-on error '" + folder().path().string() +
@@ -52,7 +52,7 @@ TEST_F(Packages, haveNoErrorsForLintian)
     EXPECT_THAT(complaints, Not(HasSubstr("E: "))) << complaints;
 }
 
-TEST_F(Packages, dependOnWhatTheyLoad)
+TEST_F(PackagesTest, DependOnWhatTheyLoad)
 {
     const std::string provider = field("sensor-profile-provider", "Depends");
     EXPECT_THAT(provider, HasSubstr("libsensors5"));
@@ -63,7 +63,7 @@ TEST_F(Packages, dependOnWhatTheyLoad)
             "sensor-profile-provider (= " + field("sensor-profile-provider", "Version") + ")"));
 }
 
-TEST_F(Packages, canBeReadByEverybody)
+TEST_F(PackagesTest, CanBeReadByEverybody)
 {
     for (const char* const package : {"sensor-profile", "sensor-profile-provider"}) {
         const auto entries = linesOf(outputOf(
@@ -75,7 +75,7 @@ TEST_F(Packages, canBeReadByEverybody)
 }
 
 // What Debian wants of each package, and a plain installation does not have.
-TEST_F(Packages, saySomethingOfThemselves)
+TEST_F(PackagesTest, SaySomethingOfThemselves)
 {
     for (const std::string package : {"sensor-profile", "sensor-profile-provider"}) {
         const std::string documents = " ./usr/share/doc/" + package + "/";
@@ -88,7 +88,7 @@ TEST_F(Packages, saySomethingOfThemselves)
     }
 }
 
-TEST_F(Packages, haveTheVersionOfTheirLogOfChanges)
+TEST_F(PackagesTest, HaveTheVersionOfTheirLogOfChanges)
 {
     const std::string log = contentOf(packaging + "debian/changelog");
     for (const char* const package : {"sensor-profile", "sensor-profile-provider"}) {
@@ -99,7 +99,7 @@ TEST_F(Packages, haveTheVersionOfTheirLogOfChanges)
 }
 
 // Those of the whole source tree.
-TEST(Scripts, areFreeOfWarnings)
+TEST(ScriptsTest, AreFreeOfWarnings)
 {
     const std::string complaints = outputOf(
         "cd '" SENSOR_PROFILE_SOURCE_DIR "' && "

@@ -10,7 +10,7 @@ using testing::HasSubstr;
 using testing::IsEmpty;
 using namespace Testing;
 
-class WithoutObjectManager : public RegisterTest {
+class WithoutObjectManagerTest : public RegisterTest {
 protected:
     WithoutObjectManager() : RegisterTest({"cimmof", "sfcbrepos"}) {}
 
@@ -25,19 +25,19 @@ protected:
     }
 };
 
-TEST_F(WithoutObjectManager, saysThatNoneIsThere)
+TEST_F(WithoutObjectManagerTest, SaysThatNoneIsThere)
 {
     expectRefusal({"register"}, 1, "neither OpenPegasus (cimmof, cimprovider) nor sfcb");
 }
 
-TEST_F(WithoutObjectManager, saysWhichCommandOfTheNamedOneIsMissing)
+TEST_F(WithoutObjectManagerTest, SaysWhichCommandOfTheNamedOneIsMissing)
 {
     expectRefusal({"register", "--object-manager", "openpegasus"}, 1,
         "cimprovider of openpegasus is not installed");
     expectRefusal({"remove", "--object-manager=sfcb"}, 1, "sfcbstage of sfcb is not installed");
 }
 
-TEST_F(WithoutObjectManager, refusesCommandLinesThatMakeNoSense)
+TEST_F(WithoutObjectManagerTest, RefusesCommandLinesThatMakeNoSense)
 {
     expectRefusal({}, 2, "a command is missing");
     expectRefusal({"install"}, 2, "unknown command install");
@@ -59,19 +59,19 @@ TEST_F(WithoutObjectManager, refusesCommandLinesThatMakeNoSense)
         expectRefusal({"register", "--namespace", name}, 2, "is no namespace");
 }
 
-TEST_F(WithoutObjectManager, explainsItself)
+TEST_F(WithoutObjectManagerTest, ExplainsItself)
 {
     const std::string help = mustRun({"--help"});
     EXPECT_THAT(help, HasSubstr("Usage: sensor-profile-register register|remove"));
     EXPECT_THAT(help, HasSubstr("--dry-run"));
 }
 
-class BothObjectManagers : public RegisterTest {
+class BothObjectManagersTest : public RegisterTest {
 protected:
     BothObjectManagers() : RegisterTest({"cimmof", "cimprovider", "sfcbstage", "sfcbrepos"}) {}
 };
 
-TEST_F(BothObjectManagers, mustBeChosenFrom)
+TEST_F(BothObjectManagersTest, MustBeChosenFrom)
 {
     const Ended ended = runRegister({"register"});
     EXPECT_EQ(ended.code, 1);
@@ -79,7 +79,7 @@ TEST_F(BothObjectManagers, mustBeChosenFrom)
     EXPECT_THAT(calls(), IsEmpty());
 }
 
-TEST_F(BothObjectManagers, areChosenByName)
+TEST_F(BothObjectManagersTest, AreChosenByName)
 {
     mustRun({"register", "--object-manager", "sfcb"});
     EXPECT_THAT(calls().at(0), testing::StartsWith("sfcbstage "));

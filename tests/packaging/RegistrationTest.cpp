@@ -92,13 +92,13 @@ std::vector<Registration> readBlocks(const std::string& text)
     return blocks;
 }
 
-TEST(RegistrationFile, saysWhatTheEmbeddedManagerKnows)
+TEST(RegistrationFileTest, SaysWhatTheEmbeddedManagerKnows)
 {
     EXPECT_THAT(readBlocks(Testing::contentOf(folder + "sensor-profile.reg")),
         UnorderedElementsAreArray(embeddedTable()));
 }
 
-TEST(RegistrationMof, saysWhatTheEmbeddedManagerKnows)
+TEST(RegistrationMofTest, SaysWhatTheEmbeddedManagerKnows)
 {
     const auto instances =
         readInstances(Testing::contentOf(folder + "sensor-profile-registration.mof"));

@@ -17,7 +17,7 @@ using testing::Not;
 using namespace Testing;
 namespace fs = std::filesystem;
 
-class Sfcb : public RegisterTest {
+class SfcbTest : public RegisterTest {
 protected:
     Sfcb() : RegisterTest({"sfcbstage", "sfcbrepos"}) {}
 
@@ -44,7 +44,7 @@ protected:
     const std::string buildStep_ = "sfcbrepos -s " + path("stage") + " -f";
 };
 
-TEST_F(Sfcb, stagesTheFilesAndBuildsTheRepository)
+TEST_F(SfcbTest, StagesTheFilesAndBuildsTheRepository)
 {
     EXPECT_THAT(mustRun({"register"}), HasSubstr("sfcb must be restarted"));
     EXPECT_THAT(calls(), ElementsAre(stageStep(computerSystem_), stageStep(sensors_), buildStep_));
@@ -55,7 +55,7 @@ TEST_F(Sfcb, stagesTheFilesAndBuildsTheRepository)
         links(), ElementsAre("libComputerSystemProvider.so", "libSensorProfileProvider.so"));
 }
 
-TEST_F(Sfcb, namesNoFoldersThatNobodyNamed)
+TEST_F(SfcbTest, NamesNoFoldersThatNobodyNamed)
 {
     EXPECT_THAT(plan({"register"}),
         AllOf(HasSubstr("sfcbstage -n root/cimv2 -r " + shared("registration/sensor-profile.reg") +
@@ -64,7 +64,7 @@ TEST_F(Sfcb, namesNoFoldersThatNobodyNamed)
     EXPECT_THAT(calls(), IsEmpty());
 }
 
-TEST_F(Sfcb, repeatingDoesTheSameAgain)
+TEST_F(SfcbTest, RepeatingDoesTheSameAgain)
 {
     mustRun({"register"});
     calls();
@@ -74,7 +74,7 @@ TEST_F(Sfcb, repeatingDoesTheSameAgain)
     EXPECT_EQ(links().size(), 2U);
 }
 
-TEST_F(Sfcb, removesWhatWasStaged)
+TEST_F(SfcbTest, RemovesWhatWasStaged)
 {
     mustRun({"register"});
     calls();
@@ -88,7 +88,7 @@ TEST_F(Sfcb, removesWhatWasStaged)
     EXPECT_THAT(stage(), ElementsAre("regs/other.reg"));
 }
 
-TEST_F(Sfcb, removesLinksThatAreLeftOfIt)
+TEST_F(SfcbTest, RemovesLinksThatAreLeftOfIt)
 {
     mustRun({"register"});
     fs::remove_all(path("stage/regs"));
@@ -98,7 +98,7 @@ TEST_F(Sfcb, removesLinksThatAreLeftOfIt)
 }
 
 // As somebody to whom permissions apply: root without the right to pass them over.
-TEST_F(Sfcb, refusesAStageThatCannotBeLookedInto)
+TEST_F(SfcbTest, RefusesAStageThatCannotBeLookedInto)
 {
     mustRun({"register"});
     for (const char* const name : {"stage/regs", "stage/mofs/root", "stage"}) {
@@ -118,7 +118,7 @@ TEST_F(Sfcb, refusesAStageThatCannotBeLookedInto)
     }
 }
 
-TEST_F(Sfcb, removingNeedsTheStagingFolder)
+TEST_F(SfcbTest, RemovingNeedsTheStagingFolder)
 {
     if (fs::exists("/var/lib/sfcb/stage"))
         return cannotRun("this machine has the folder of sfcb");
@@ -128,7 +128,7 @@ TEST_F(Sfcb, removingNeedsTheStagingFolder)
     EXPECT_THAT(calls(), IsEmpty());
 }
 
-TEST_F(Sfcb, registersWithoutTheComputerSystem)
+TEST_F(SfcbTest, RegistersWithoutTheComputerSystem)
 {
     mustRun({"register"});
     mustRun({"register", "--without-computer-system"});
@@ -142,7 +142,7 @@ TEST_F(Sfcb, registersWithoutTheComputerSystem)
     EXPECT_THAT(links(), ElementsAre("libSensorProfileProvider.so"));
 }
 
-TEST_F(Sfcb, registeringInAnotherNamespaceMovesTheClasses)
+TEST_F(SfcbTest, RegisteringInAnotherNamespaceMovesTheClasses)
 {
     mustRun({"register"});
     folder_.write("stage/mofs/root/cimv2/other.mof", "somebody else's");
@@ -161,7 +161,7 @@ TEST_F(Sfcb, registeringInAnotherNamespaceMovesTheClasses)
     EXPECT_EQ(stagedRegistration(), expected);
 }
 
-TEST_F(Sfcb, removingFromANamespaceLeavesTheRegistrationOfAnother)
+TEST_F(SfcbTest, RemovingFromANamespaceLeavesTheRegistrationOfAnother)
 {
     mustRun({"register", "--namespace", "root/a"});
     mustRun({"register", "--namespace", "root/b"});
@@ -189,7 +189,7 @@ TEST_F(Sfcb, removingFromANamespaceLeavesTheRegistrationOfAnother)
     EXPECT_THAT(links(), IsEmpty());
 }
 
-TEST_F(Sfcb, removingWithoutANamespaceRemovesFromWhicheverItIs)
+TEST_F(SfcbTest, RemovingWithoutANamespaceRemovesFromWhicheverItIs)
 {
     mustRun({"register", "--namespace", "root/b"});
     mustRun({"remove"});
@@ -197,7 +197,7 @@ TEST_F(Sfcb, removingWithoutANamespaceRemovesFromWhicheverItIs)
     EXPECT_THAT(links(), IsEmpty());
 }
 
-TEST_F(Sfcb, dryRunPrintsTheStepsAndTakesNone)
+TEST_F(SfcbTest, DryRunPrintsTheStepsAndTakesNone)
 {
     const Lines planned = linesOf(mustRun({"register", "--dry-run"}));
     EXPECT_EQ(planned.at(2), stageStep(computerSystem_));
@@ -212,7 +212,7 @@ TEST_F(Sfcb, dryRunPrintsTheStepsAndTakesNone)
 }
 
 // Whoever types what a dry run prints gets what the run itself does.
-TEST_F(Sfcb, dryRunCanBeFollowed)
+TEST_F(SfcbTest, DryRunCanBeFollowed)
 {
     const Lines options = {"register", "--namespace", "root/s", "--without-computer-system"};
     Lines planning = options;
@@ -236,9 +236,9 @@ TEST_F(Sfcb, dryRunCanBeFollowed)
     EXPECT_EQ(links(), linked);
 }
 
-class EveryFirstStepOfSfcb : public EveryStepOf<Sfcb> {};
+class EveryFirstStepOfSfcbTest : public EveryStepOf<Sfcb> {};
 
-TEST_P(EveryFirstStepOfSfcb, canFailAndBeUndone)
+TEST_P(EveryFirstStepOfSfcbTest, CanFailAndBeUndone)
 {
     const std::string message =
         failing({"register"}, {linkStep(sensorLibrary_), linkStep(systemLibrary_),
@@ -251,11 +251,11 @@ TEST_P(EveryFirstStepOfSfcb, canFailAndBeUndone)
     EXPECT_EQ(stage().size(), 3U);
 }
 
-INSTANTIATE_TEST_SUITE_P(Steps, EveryFirstStepOfSfcb, testing::Range<std::size_t>(0, 5));
+INSTANTIATE_TEST_SUITE_P(Steps, EveryFirstStepOfSfcbTest, testing::Range<std::size_t>(0, 5));
 
-class EveryMovingStepOfSfcb : public EveryStepOf<Sfcb> {};
+class EveryMovingStepOfSfcbTest : public EveryStepOf<Sfcb> {};
 
-TEST_P(EveryMovingStepOfSfcb, canFailAndLeadBack)
+TEST_P(EveryMovingStepOfSfcbTest, CanFailAndLeadBack)
 {
     mustRun({"register", "--without-computer-system"});
     const Lines files = stage();
@@ -271,9 +271,9 @@ TEST_P(EveryMovingStepOfSfcb, canFailAndLeadBack)
     EXPECT_THAT(links(), ElementsAre("libSensorProfileProvider.so"));
 }
 
-INSTANTIATE_TEST_SUITE_P(Steps, EveryMovingStepOfSfcb, testing::Range<std::size_t>(0, 5));
+INSTANTIATE_TEST_SUITE_P(Steps, EveryMovingStepOfSfcbTest, testing::Range<std::size_t>(0, 5));
 
-class EveryRemovalStepOfSfcb : public EveryStepOf<Sfcb> {
+class EveryRemovalStepOfSfcbTest : public EveryStepOf<Sfcb> {
 protected:
     EveryRemovalStepOfSfcb() { mustRun({"register", "--namespace", "root/s"}); }
 
@@ -287,7 +287,7 @@ protected:
     }
 };
 
-TEST_P(EveryRemovalStepOfSfcb, canFailAndBeUndone)
+TEST_P(EveryRemovalStepOfSfcbTest, CanFailAndBeUndone)
 {
     const Lines files = stage();
     const std::string registration = stagedRegistration();
@@ -297,7 +297,7 @@ TEST_P(EveryRemovalStepOfSfcb, canFailAndBeUndone)
     EXPECT_EQ(links().size(), 2U);
 }
 
-TEST_P(EveryRemovalStepOfSfcb, canFailAndBeRepeated)
+TEST_P(EveryRemovalStepOfSfcbTest, CanFailAndBeRepeated)
 {
     failingRemoval();
     mustRun({"remove"});
@@ -306,6 +306,6 @@ TEST_P(EveryRemovalStepOfSfcb, canFailAndBeRepeated)
     EXPECT_THAT(links(), IsEmpty());
 }
 
-INSTANTIATE_TEST_SUITE_P(Steps, EveryRemovalStepOfSfcb, testing::Range<std::size_t>(0, 4));
+INSTANTIATE_TEST_SUITE_P(Steps, EveryRemovalStepOfSfcbTest, testing::Range<std::size_t>(0, 4));
 
 } // namespace SfcbTests

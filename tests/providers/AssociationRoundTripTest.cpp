@@ -91,7 +91,7 @@ private:
 INSTANTIATE_TEST_SUITE_P(Each, AssociationRoundTripTest, ::testing::ValuesIn(Journeys),
     [](const ::testing::TestParamInfo<Journey>& journey) { return journey.param.name; });
 
-TEST_P(AssociationRoundTripTest, fromNamesAndInstancesToInstances)
+TEST_P(AssociationRoundTripTest, FromNamesAndInstancesToInstances)
 {
     const std::size_t pairs = GetParam().otherClass == std::string(SystemClass) ? 6 : 3;
     expectOk(enumerateNames(path(GetParam().association)));
@@ -136,7 +136,7 @@ TEST_P(AssociationRoundTripTest, RequestsForInstancesEndWithTheirExitMarkBeforeT
     }
 }
 
-TEST_P(AssociationRoundTripTest, fromReferencesOfEitherEndToInstances)
+TEST_P(AssociationRoundTripTest, FromReferencesOfEitherEndToInstances)
 {
     const std::size_t others = GetParam().otherClass == std::string(SystemClass) ? 2 : 1;
     expectOk(references(otherEnd()));
@@ -149,7 +149,7 @@ TEST_P(AssociationRoundTripTest, fromReferencesOfEitherEndToInstances)
     expectAllFetched(others);
 }
 
-TEST_P(AssociationRoundTripTest, fromAssociatorsOfEitherEndToInstancesAndBack)
+TEST_P(AssociationRoundTripTest, FromAssociatorsOfEitherEndToInstancesAndBack)
 {
     const std::size_t others = GetParam().otherClass == std::string(SystemClass) ? 2 : 1;
     expectOk(associatorNames(otherEnd()));

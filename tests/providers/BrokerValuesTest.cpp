@@ -45,13 +45,13 @@ protected:
     CMPIStatus status_ = {CMPI_RC_OK, nullptr};
 };
 
-TEST_F(BrokerValuesTest, aTextKeyIsItsString)
+TEST_F(BrokerValuesTest, ATextKeyIsItsString)
 {
     for (const CMPIValueState state : Usable)
         EXPECT_EQ(readAsText(dataOf(CMPI_string, state, text_), &status_), text_);
 }
 
-TEST_F(BrokerValuesTest, aTextKeyOfAnotherTypeOrStateIsAbsentAndNoFailure)
+TEST_F(BrokerValuesTest, ATextKeyOfAnotherTypeOrStateIsAbsentAndNoFailure)
 {
     for (const CMPIValueState state : Unusable)
         EXPECT_EQ(readAsText(dataOf(CMPI_string, state, text_), &status_), nullptr) << state;
@@ -63,7 +63,7 @@ TEST_F(BrokerValuesTest, aTextKeyOfAnotherTypeOrStateIsAbsentAndNoFailure)
     EXPECT_EQ(status_.rc, CMPI_RC_OK);
 }
 
-TEST_F(BrokerValuesTest, aPathIsAPathWithAHandleWhateverItsState)
+TEST_F(BrokerValuesTest, APathIsAPathWithAHandleWhateverItsState)
 {
     Host::ObjectPath& path = this->path("C");
     CMPIData data = {CMPI_ref, 0, {}};
@@ -80,7 +80,7 @@ TEST_F(BrokerValuesTest, aPathIsAPathWithAHandleWhateverItsState)
     EXPECT_EQ(pathOf(data), nullptr);
 }
 
-TEST_F(BrokerValuesTest, anInstanceIsAnInstanceWithAHandleWhateverItsState)
+TEST_F(BrokerValuesTest, AnInstanceIsAnInstanceWithAHandleWhateverItsState)
 {
     Host::Instance& instance = request_->makeInstance(path("C"));
     CMPIData data = {CMPI_instance, 0, {}};

@@ -27,7 +27,7 @@ protected:
     ScriptedMachine machine_;
 };
 
-TEST_F(CapabilitiesProviderFaultTest, namesThatCannotBeMadeEndInTheFactorysStatusAndAnOpenResult)
+TEST_F(CapabilitiesProviderFaultTest, NamesThatCannotBeMadeEndInTheFactorysStatusAndAnOpenResult)
 {
     for (const FaultManner manner : Undelivered)
         for (const BrokerCall call : {BrokerCall::newObjectPath, BrokerCall::getNameSpace}) {
@@ -43,7 +43,7 @@ TEST_F(CapabilitiesProviderFaultTest, namesThatCannotBeMadeEndInTheFactorysStatu
         }
 }
 
-TEST_F(CapabilitiesProviderFaultTest, aNameThatLostItsHandleIsPassedOver)
+TEST_F(CapabilitiesProviderFaultTest, ANameThatLostItsHandleIsPassedOver)
 {
     const auto request = run(Names, {BrokerCall::addKey, 1, FaultManner::lostHandle});
     EXPECT_EQ(request->status.rc, CMPI_RC_OK);
@@ -52,7 +52,7 @@ TEST_F(CapabilitiesProviderFaultTest, aNameThatLostItsHandleIsPassedOver)
     EXPECT_TRUE(request->answer.isDone());
 }
 
-TEST_F(CapabilitiesProviderFaultTest, aMissingArrayStandsInTheStatusBesideTheInstance)
+TEST_F(CapabilitiesProviderFaultTest, AMissingArrayStandsInTheStatusBesideTheInstance)
 {
     for (const RequestKind& kind : {Instances, OneInstance}) {
         const auto request =

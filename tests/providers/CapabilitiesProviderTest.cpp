@@ -39,7 +39,7 @@ protected:
 
 // ---- EnumInstanceNames ----
 
-TEST_F(CapabilitiesProviderTest, thereIsOneNameAndTheResultIsClosed)
+TEST_F(CapabilitiesProviderTest, ThereIsOneNameAndTheResultIsClosed)
 {
     expectOk(enumerateNames("root/other"));
     ASSERT_EQ(answer_.paths().size(), 1U);
@@ -53,7 +53,7 @@ TEST_F(CapabilitiesProviderTest, thereIsOneNameAndTheResultIsClosed)
     EXPECT_TRUE(messages_.empty());
 }
 
-TEST_F(CapabilitiesProviderTest, aMachineWithoutSensorsOrWithABrokenOneHasItsCapabilities)
+TEST_F(CapabilitiesProviderTest, AMachineWithoutSensorsOrWithABrokenOneHasItsCapabilities)
 {
     const ScriptedMachine empty;
     expectOk(enumerateNames());
@@ -68,7 +68,7 @@ TEST_F(CapabilitiesProviderTest, aMachineWithoutSensorsOrWithABrokenOneHasItsCap
 
 // ---- EnumInstances ----
 
-TEST_F(CapabilitiesProviderTest, thereIsOneInstanceAndTheResultIsClosed)
+TEST_F(CapabilitiesProviderTest, ThereIsOneInstanceAndTheResultIsClosed)
 {
     expectOk(enumerate());
     ASSERT_EQ(answer_.instances().size(), 1U);
@@ -80,7 +80,7 @@ TEST_F(CapabilitiesProviderTest, thereIsOneInstanceAndTheResultIsClosed)
     EXPECT_TRUE(messages_.empty());
 }
 
-TEST_F(CapabilitiesProviderTest, anInstanceHasTheListedPropertiesAndTheKey)
+TEST_F(CapabilitiesProviderTest, AnInstanceHasTheListedPropertiesAndTheKey)
 {
     const char* properties[] = {"RequestedStatesSupported", nullptr};
     expectOk(enumerate(properties));
@@ -89,7 +89,7 @@ TEST_F(CapabilitiesProviderTest, anInstanceHasTheListedPropertiesAndTheKey)
         ElementsAre("InstanceID", "RequestedStatesSupported"));
 }
 
-TEST_F(CapabilitiesProviderTest, anEmptyListLeavesTheKeyAlone)
+TEST_F(CapabilitiesProviderTest, AnEmptyListLeavesTheKeyAlone)
 {
     const char* properties[] = {nullptr};
     expectOk(enumerate(properties));
@@ -99,7 +99,7 @@ TEST_F(CapabilitiesProviderTest, anEmptyListLeavesTheKeyAlone)
 
 // ---- GetInstance ----
 
-TEST_F(CapabilitiesProviderTest, anInstanceIsFoundByItsIdentifier)
+TEST_F(CapabilitiesProviderTest, AnInstanceIsFoundByItsIdentifier)
 {
     const char* properties[] = {"ElementNameEditSupported", nullptr};
     for (const char** const list : {static_cast<const char**>(nullptr), properties}) {
@@ -116,7 +116,7 @@ TEST_F(CapabilitiesProviderTest, anInstanceIsFoundByItsIdentifier)
 
 // ---- A key that is no text: nothing is found, though the machine has a sensor ----
 
-TEST_F(CapabilitiesProviderTest, aSensorsOwnPathFindsNothingHere)
+TEST_F(CapabilitiesProviderTest, ASensorsOwnPathFindsNothingHere)
 {
     broker_.setClassInformation(&Testing::profileClasses());
     expectOk(get(path("ZUMLO_NumericSensor",

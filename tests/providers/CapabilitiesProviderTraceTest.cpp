@@ -65,14 +65,14 @@ protected:
     CMPIInstanceMI* mi_;
 };
 
-TEST_F(CapabilitiesProviderTraceTest, ofEnumeratedNames)
+TEST_F(CapabilitiesProviderTraceTest, OfEnumeratedNames)
 {
     const HandlerLines lines = handler("EnumInstanceNames");
     EXPECT_THAT(traceOfNames(), ElementsAreArray(sequence({lines.entry(74), Built,
                                     operation(Paths, 1041, 1093), lines.exit(114)})));
 }
 
-TEST_F(CapabilitiesProviderTraceTest, ofNamesThatCannotBeMade)
+TEST_F(CapabilitiesProviderTraceTest, OfNamesThatCannotBeMade)
 {
     const HandlerLines lines = handler("EnumInstanceNames");
     FaultyBroker faulty(broker_);
@@ -84,14 +84,14 @@ TEST_F(CapabilitiesProviderTraceTest, ofNamesThatCannotBeMade)
     EXPECT_FALSE(answer_.isDone());
 }
 
-TEST_F(CapabilitiesProviderTraceTest, ofEnumeratedInstances)
+TEST_F(CapabilitiesProviderTraceTest, OfEnumeratedInstances)
 {
     const HandlerLines lines = handler("EnumInstances");
     EXPECT_THAT(traceOfInstances(), ElementsAreArray(sequence({lines.entry(137), Built,
                                         around(Instances, Instance), lines.exit(169)})));
 }
 
-TEST_F(CapabilitiesProviderTraceTest, ofAnInstanceFound)
+TEST_F(CapabilitiesProviderTraceTest, OfAnInstanceFound)
 {
     const HandlerLines lines = handler("GetInstance");
     EXPECT_THAT(traceOfOne({{"InstanceID", Identifier}}),
@@ -99,7 +99,7 @@ TEST_F(CapabilitiesProviderTraceTest, ofAnInstanceFound)
             around(operation(OneInstance, 1134, 1158), Instance), lines.exit(283)})));
 }
 
-TEST_F(CapabilitiesProviderTraceTest, ofAnInstanceNotFound)
+TEST_F(CapabilitiesProviderTraceTest, OfAnInstanceNotFound)
 {
     const HandlerLines lines = handler("GetInstance");
     EXPECT_THAT(traceOfOne({{"InstanceID", "other"}}),
@@ -108,7 +108,7 @@ TEST_F(CapabilitiesProviderTraceTest, ofAnInstanceNotFound)
 }
 
 // The search is made among the capabilities of a factory that has sensors only.
-TEST_F(CapabilitiesProviderTraceTest, ofAnInstanceSearchedByItsPath)
+TEST_F(CapabilitiesProviderTraceTest, OfAnInstanceSearchedByItsPath)
 {
     const HandlerLines lines = handler("GetInstance");
     EXPECT_THAT(traceOfOne({{"Other", "x"}}),
@@ -116,7 +116,7 @@ TEST_F(CapabilitiesProviderTraceTest, ofAnInstanceSearchedByItsPath)
             {lines.entry(191), builtFactory({"_createSensorMap"}), Instances, lines.exit(283)})));
 }
 
-TEST_F(CapabilitiesProviderTraceTest, ofARequestWithoutKeysHasNoFactory)
+TEST_F(CapabilitiesProviderTraceTest, OfARequestWithoutKeysHasNoFactory)
 {
     const HandlerLines lines = handler("GetInstance");
     EXPECT_THAT(traceOfOne({}), ElementsAreArray(sequence({lines.entry(191), lines.exit(283)})));

@@ -54,7 +54,7 @@ protected:
 
 // ---- Associators ----
 
-TEST_F(ElementCapabilitiesAssociationTest, aSensorIsAssociatedWithTheCapabilities)
+TEST_F(ElementCapabilitiesAssociationTest, ASensorIsAssociatedWithTheCapabilities)
 {
     expectOk(associators(sensor("B:/2", "root/other"), {.associationClass = Class}));
     ASSERT_EQ(answer_.instances().size(), 1U);
@@ -69,7 +69,7 @@ TEST_F(ElementCapabilitiesAssociationTest, aSensorIsAssociatedWithTheCapabilitie
         messages_, ElementsAre(BrokerMessage{1, Provider, "Target Class is PhysicalPackageClass"}));
 }
 
-TEST_F(ElementCapabilitiesAssociationTest, capabilitiesAreAssociatedWithEverySensor)
+TEST_F(ElementCapabilitiesAssociationTest, CapabilitiesAreAssociatedWithEverySensor)
 {
     expectOk(associators(capabilities(), {.associationClass = Class}));
     EXPECT_THAT(delivered(), ElementsAre("A:/1", "B:/2", "C:/3"));
@@ -80,7 +80,7 @@ TEST_F(ElementCapabilitiesAssociationTest, capabilitiesAreAssociatedWithEverySen
         messages_, ElementsAre(BrokerMessage{1, Provider, "Target Class is ComputerSystemClass"}));
 }
 
-TEST_F(ElementCapabilitiesAssociationTest, associatorsHaveTheListedProperties)
+TEST_F(ElementCapabilitiesAssociationTest, AssociatorsHaveTheListedProperties)
 {
     const char* sensorList[] = {"Name", nullptr};
     expectOk(associators(capabilities(), {.properties = sensorList}));
@@ -92,7 +92,7 @@ TEST_F(ElementCapabilitiesAssociationTest, associatorsHaveTheListedProperties)
     EXPECT_EQ(answer_.instances()[3]->properties().size(), 2U);
 }
 
-TEST_F(ElementCapabilitiesAssociationTest, associatorsAreWhole)
+TEST_F(ElementCapabilitiesAssociationTest, AssociatorsAreWhole)
 {
     expectOk(associators(capabilities()));
     ASSERT_EQ(answer_.instances().size(), 3U);
@@ -100,7 +100,7 @@ TEST_F(ElementCapabilitiesAssociationTest, associatorsAreWhole)
         EXPECT_GT(instance->properties().size(), 4U); // more than an object path needs
 }
 
-TEST_F(ElementCapabilitiesWithoutSensorsTest, associatorsOfCapabilitiesAreAnOpenEmptyAnswer)
+TEST_F(ElementCapabilitiesWithoutSensorsTest, AssociatorsOfCapabilitiesAreAnOpenEmptyAnswer)
 {
     expectOk(associators(capabilities()));
     expectNothing(false);
@@ -110,7 +110,7 @@ TEST_F(ElementCapabilitiesWithoutSensorsTest, associatorsOfCapabilitiesAreAnOpen
 
 // ---- AssociatorNames ----
 
-TEST_F(ElementCapabilitiesAssociationTest, namesOfAssociatorsAreThePathsOfTheFarEnds)
+TEST_F(ElementCapabilitiesAssociationTest, NamesOfAssociatorsAreThePathsOfTheFarEnds)
 {
     expectOk(associatorNames(sensor("A:/1", "root/other"), {.associationClass = Class}));
     ASSERT_EQ(answer_.paths().size(), 1U);
@@ -122,7 +122,7 @@ TEST_F(ElementCapabilitiesAssociationTest, namesOfAssociatorsAreThePathsOfTheFar
     EXPECT_FALSE(answer_.isDone());
 }
 
-TEST_F(ElementCapabilitiesWithoutSensorsTest, namesOfAssociatorsAreAnOpenEmptyAnswer)
+TEST_F(ElementCapabilitiesWithoutSensorsTest, NamesOfAssociatorsAreAnOpenEmptyAnswer)
 {
     expectOk(associatorNames(capabilities()));
     expectNothing(false);
@@ -130,7 +130,7 @@ TEST_F(ElementCapabilitiesWithoutSensorsTest, namesOfAssociatorsAreAnOpenEmptyAn
 
 // ---- What narrows an answer and what does not ----
 
-TEST_F(ElementCapabilitiesAssociationTest, noFilterButTheAssociationClassTakesPart)
+TEST_F(ElementCapabilitiesAssociationTest, NoFilterButTheAssociationClassTakesPart)
 {
     const Filter filter = {Class, "NOT_AClass", "Nobody", "Nowhere", nullptr};
     expectOk(associators(sensor("A:/1"), filter));
@@ -144,14 +144,14 @@ TEST_F(ElementCapabilitiesAssociationTest, noFilterButTheAssociationClassTakesPa
     EXPECT_EQ(answer_.paths().size(), 2U);
 }
 
-TEST_F(ElementCapabilitiesAssociationTest, theSourcesKeysDoNotMatter)
+TEST_F(ElementCapabilitiesAssociationTest, TheSourcesKeysDoNotMatter)
 {
     expectOk(associatorNames(path(SensorClass)));
     expectOk(associatorNames(path(CapabilitiesClass, {{"InstanceID", "other"}})));
     EXPECT_THAT(delivered(), ElementsAre(Cap, "A:/1", "B:/2", "C:/3"));
 }
 
-TEST_F(ElementCapabilitiesAssociationTest, keysOfOtherTypesDoNotMatterEither)
+TEST_F(ElementCapabilitiesAssociationTest, KeysOfOtherTypesDoNotMatterEither)
 {
     Host::ObjectPath& element = path(SensorClass);
     element.addKey("DeviceID", Host::Value::integer(CMPI_uint64, 7));
@@ -167,7 +167,7 @@ TEST_F(ElementCapabilitiesAssociationTest, keysOfOtherTypesDoNotMatterEither)
     EXPECT_EQ(answer_.paths().size(), 6U);
 }
 
-TEST_F(ElementCapabilitiesAssociationTest, anAbsentAssociationClassIsTheProvidersOwn)
+TEST_F(ElementCapabilitiesAssociationTest, AnAbsentAssociationClassIsTheProvidersOwn)
 {
     expectOk(associators(sensor("A:/1")));
     expectOk(associatorNames(capabilities()));
@@ -176,7 +176,7 @@ TEST_F(ElementCapabilitiesAssociationTest, anAbsentAssociationClassIsTheProvider
 }
 
 // A target of a class that this provider does not lead to.
-TEST_F(ElementCapabilitiesAssociationTest, theOtherAssociationOfASensorLeadsNowhere)
+TEST_F(ElementCapabilitiesAssociationTest, TheOtherAssociationOfASensorLeadsNowhere)
 {
     expectOk(associators(sensor("A:/1"), {.associationClass = "ZUMLO_SensorSystemDevice"}));
     expectOk(associatorNames(sensor("A:/1"), {.associationClass = "ZUMLO_SensorSystemDevice"}));
@@ -188,20 +188,20 @@ TEST_F(ElementCapabilitiesAssociationTest, theOtherAssociationOfASensorLeadsNowh
             BrokerMessage{1, "SensorSystemDeviceProvider", "Target Class is ComputerSystemClass"}));
 }
 
-TEST_F(ElementCapabilitiesAssociationTest, theOtherAssociationOfASystemLeadsToTheSensors)
+TEST_F(ElementCapabilitiesAssociationTest, TheOtherAssociationOfASystemLeadsToTheSensors)
 {
     expectOk(associatorNames(system("host"), {.associationClass = "ZUMLO_SensorSystemDevice"}));
     EXPECT_THAT(delivered(), ElementsAre("A:/1", "B:/2", "C:/3"));
 }
 
-TEST_F(ElementCapabilitiesAssociationTest, anotherAssociationClassHasNoTarget)
+TEST_F(ElementCapabilitiesAssociationTest, AnotherAssociationClassHasNoTarget)
 {
     for (const char* const other : {"zumlo_sensorelementcapabilities",
              "ZUMLO_SENSORELEMENTCAPABILITIES", "CIM_ElementCapabilities", ""})
         expectNoTargetFrom(sensor("A:/1"), {.associationClass = other});
 }
 
-TEST_F(ElementCapabilitiesAssociationTest, anotherSourceHasNoTarget)
+TEST_F(ElementCapabilitiesAssociationTest, AnotherSourceHasNoTarget)
 {
     for (Host::ObjectPath* const source :
         {&system("host"), &path("zumlo_numericsensor"), &path(Class)}) {
@@ -211,7 +211,7 @@ TEST_F(ElementCapabilitiesAssociationTest, anotherSourceHasNoTarget)
     }
 }
 
-TEST_F(ElementCapabilitiesAssociationTest, aMissingTargetHasNoMessageWithoutABroker)
+TEST_F(ElementCapabilitiesAssociationTest, AMissingTargetHasNoMessageWithoutABroker)
 {
     SensorElementCapabilitiesProvider_Create_InstanceMI(nullptr, nullptr, nullptr);
     for (const CMPIStatus& status : {associators(sensor("A:/1")), associatorNames(sensor("A:/1")),
@@ -224,7 +224,7 @@ TEST_F(ElementCapabilitiesAssociationTest, aMissingTargetHasNoMessageWithoutABro
 
 // ---- References ----
 
-TEST_F(ElementCapabilitiesAssociationTest, referencesOfASensorPairItWithTheCapabilities)
+TEST_F(ElementCapabilitiesAssociationTest, ReferencesOfASensorPairItWithTheCapabilities)
 {
     const Host::ObjectPath& source = sensor("B:/2", "root/other");
     const char* properties[] = {"Nothing", nullptr};
@@ -242,7 +242,7 @@ TEST_F(ElementCapabilitiesAssociationTest, referencesOfASensorPairItWithTheCapab
         messages_, ElementsAre(BrokerMessage{1, Provider, "Target Class is PhysicalPackageClass"}));
 }
 
-TEST_F(ElementCapabilitiesAssociationTest, referencesOfCapabilitiesPairThemWithEverySensor)
+TEST_F(ElementCapabilitiesAssociationTest, ReferencesOfCapabilitiesPairThemWithEverySensor)
 {
     const Host::ObjectPath& source = path(CapabilitiesClass, {{"InstanceID", "as it came"}});
     expectOk(references(source));
@@ -254,7 +254,7 @@ TEST_F(ElementCapabilitiesAssociationTest, referencesOfCapabilitiesPairThemWithE
     EXPECT_FALSE(answer_.isDone());
 }
 
-TEST_F(ElementCapabilitiesAssociationTest, namesOfReferencesAreThePathsOfTheSamePairs)
+TEST_F(ElementCapabilitiesAssociationTest, NamesOfReferencesAreThePathsOfTheSamePairs)
 {
     expectOk(referenceNames(capabilities("root/other")));
     expectOk(referenceNames(sensor("D:/4", "root/other")));
@@ -264,7 +264,7 @@ TEST_F(ElementCapabilitiesAssociationTest, namesOfReferencesAreThePathsOfTheSame
 }
 
 // Some brokers tell an instance's path without its namespace.
-TEST_F(ElementCapabilitiesAssociationTest, namesOfReferencesAreGivenTheRequestsNamespace)
+TEST_F(ElementCapabilitiesAssociationTest, NamesOfReferencesAreGivenTheRequestsNamespace)
 {
     CMPIInstanceFT functions = Host::Instance::functions;
     functions.getObjectPath = [](const CMPIInstance* instance, CMPIStatus* rc) {
@@ -279,7 +279,7 @@ TEST_F(ElementCapabilitiesAssociationTest, namesOfReferencesAreGivenTheRequestsN
     EXPECT_EQ(answer_.paths()[0]->nameSpace(), "root/other");
 }
 
-TEST_F(ElementCapabilitiesWithoutSensorsTest, referencesOfCapabilitiesAreAnOpenEmptyAnswer)
+TEST_F(ElementCapabilitiesWithoutSensorsTest, ReferencesOfCapabilitiesAreAnOpenEmptyAnswer)
 {
     expectOk(references(capabilities()));
     expectOk(referenceNames(capabilities()));

@@ -80,18 +80,18 @@ protected:
 
 // ---- Every call, every way ----
 
-class ElementCapabilitiesFaultSweep : public ElementCapabilitiesFaultTest,
-                                      public ::testing::WithParamInterface<RequestKind> {};
+class ElementCapabilitiesFaultSweepTest : public ElementCapabilitiesFaultTest,
+                                          public ::testing::WithParamInterface<RequestKind> {};
 
-INSTANTIATE_TEST_SUITE_P(Instances, ElementCapabilitiesFaultSweep,
+INSTANTIATE_TEST_SUITE_P(Instances, ElementCapabilitiesFaultSweepTest,
     ::testing::Values(Names, Instances, OneInstance, Kinds.one("instanceWithoutKeys", Keyless)),
     ::testing::PrintToStringParamName());
-INSTANTIATE_TEST_SUITE_P(FromSensor, ElementCapabilitiesFaultSweep, ::testing::ValuesIn(FromSensor),
-    ::testing::PrintToStringParamName());
-INSTANTIATE_TEST_SUITE_P(FromCapabilities, ElementCapabilitiesFaultSweep,
+INSTANTIATE_TEST_SUITE_P(FromSensor, ElementCapabilitiesFaultSweepTest,
+    ::testing::ValuesIn(FromSensor), ::testing::PrintToStringParamName());
+INSTANTIATE_TEST_SUITE_P(FromCapabilities, ElementCapabilitiesFaultSweepTest,
     ::testing::ValuesIn(FromCapabilities), ::testing::PrintToStringParamName());
 
-TEST_P(ElementCapabilitiesFaultSweep, isSurvivedAndAnswersWithNothingMadeUp)
+TEST_P(ElementCapabilitiesFaultSweepTest, IsSurvivedAndAnswersWithNothingMadeUp)
 {
     sweepFaults(broker_, [&](FaultyBroker& faulty) {
         const FaultyRequest request(broker_, faulty, GetParam());
@@ -111,7 +111,7 @@ constexpr unsigned SecondAssociation = 6;
 constexpr unsigned LastKeyOfFirstSensor = 4;
 constexpr unsigned KeyOfFirstCapabilities = 9;
 
-TEST_F(ElementCapabilitiesFaultTest, namesWithoutSensorPathsEndInTheFactorysStatus)
+TEST_F(ElementCapabilitiesFaultTest, NamesWithoutSensorPathsEndInTheFactorysStatus)
 {
     for (const FaultManner manner : Undelivered) {
         const auto [request, lines] =
@@ -122,7 +122,7 @@ TEST_F(ElementCapabilitiesFaultTest, namesWithoutSensorPathsEndInTheFactorysStat
     }
 }
 
-TEST_F(ElementCapabilitiesFaultTest, namesWithoutCapabilitiesPathsEndInTheFactorysStatus)
+TEST_F(ElementCapabilitiesFaultTest, NamesWithoutCapabilitiesPathsEndInTheFactorysStatus)
 {
     for (const FaultManner manner : Undelivered) {
         const auto [request, lines] =
@@ -132,14 +132,14 @@ TEST_F(ElementCapabilitiesFaultTest, namesWithoutCapabilitiesPathsEndInTheFactor
     }
 }
 
-TEST_F(ElementCapabilitiesFaultTest, namesEndAtAnAssociationPathThatCannotBeMade)
+TEST_F(ElementCapabilitiesFaultTest, NamesEndAtAnAssociationPathThatCannotBeMade)
 {
     const std::string text = "Create CMPIObjectPath failed" + Gap + "for ElementCapabilities";
     for (const FaultManner manner : Undelivered)
         expectNamesFailure({BrokerCall::newObjectPath, FirstAssociation, manner}, text, text + ".");
 }
 
-TEST_F(ElementCapabilitiesFaultTest, namesBeforeAFailureAreDelivered)
+TEST_F(ElementCapabilitiesFaultTest, NamesBeforeAFailureAreDelivered)
 {
     const auto request =
         run(Names, {BrokerCall::newObjectPath, SecondAssociation, FaultManner::nullResult});
@@ -148,21 +148,21 @@ TEST_F(ElementCapabilitiesFaultTest, namesBeforeAFailureAreDelivered)
     EXPECT_FALSE(request->answer.isDone());
 }
 
-TEST_F(ElementCapabilitiesFaultTest, namesEndAtASensorPathThatIsGone)
+TEST_F(ElementCapabilitiesFaultTest, NamesEndAtASensorPathThatIsGone)
 {
     const std::string text = "CMPIObjectPath is NULL for Sensor class";
     expectNamesFailure(
         {BrokerCall::addKey, LastKeyOfFirstSensor, FaultManner::lostHandle}, text, text);
 }
 
-TEST_F(ElementCapabilitiesFaultTest, namesEndAtACapabilitiesPathThatIsGone)
+TEST_F(ElementCapabilitiesFaultTest, NamesEndAtACapabilitiesPathThatIsGone)
 {
     expectNamesFailure({BrokerCall::addKey, KeyOfFirstCapabilities, FaultManner::lostHandle},
         "CMPIObjectPath is" + Gap + "NULL for SensorEnabledLogicalElementCap",
         "CMPIObjectPath is NULL for" + Gap + "EnabledLogicalElementCap");
 }
 
-TEST_F(ElementCapabilitiesFaultTest, theBuilderReportsSensorPathsThatCannotBeMade)
+TEST_F(ElementCapabilitiesFaultTest, TheBuilderReportsSensorPathsThatCannotBeMade)
 {
     for (const FaultManner manner : Undelivered)
         expectBuilderFailure({BrokerCall::newObjectPath, FirstSensor, manner},
@@ -172,7 +172,7 @@ TEST_F(ElementCapabilitiesFaultTest, theBuilderReportsSensorPathsThatCannotBeMad
             "getAllSensorCMPIObjPaths failed");
 }
 
-TEST_F(ElementCapabilitiesFaultTest, theBuilderReportsCapabilitiesPathsThatCannotBeMade)
+TEST_F(ElementCapabilitiesFaultTest, TheBuilderReportsCapabilitiesPathsThatCannotBeMade)
 {
     const std::string gap(17, ' ');
     for (const FaultManner manner : Undelivered)
@@ -183,7 +183,7 @@ TEST_F(ElementCapabilitiesFaultTest, theBuilderReportsCapabilitiesPathsThatCanno
             "getAllSensorEnabledLogicalElementCapCMPIObjPaths failed");
 }
 
-TEST_F(ElementCapabilitiesFaultTest, theBuilderReportsAnAssociationPathThatCannotBeMade)
+TEST_F(ElementCapabilitiesFaultTest, TheBuilderReportsAnAssociationPathThatCannotBeMade)
 {
     const std::string text = "Create CMPIObjectPath failed for ElementCapabilities";
     for (const FaultManner manner : Undelivered)
@@ -191,21 +191,21 @@ TEST_F(ElementCapabilitiesFaultTest, theBuilderReportsAnAssociationPathThatCanno
             expectBuilderFailure({BrokerCall::newObjectPath, nth, manner}, text, text + ".", text);
 }
 
-TEST_F(ElementCapabilitiesFaultTest, theBuilderReportsASensorPathThatIsGone)
+TEST_F(ElementCapabilitiesFaultTest, TheBuilderReportsASensorPathThatIsGone)
 {
     expectBuilderFailure({BrokerCall::addKey, LastKeyOfFirstSensor, FaultManner::lostHandle},
         "CMPIObjectPath is" + std::string(17, ' ') + "NULL for Sensor",
         "CMPIObjectPath is NULL for Sensor", "CMPIObjectPath is NULL for Sensor");
 }
 
-TEST_F(ElementCapabilitiesFaultTest, theBuilderReportsACapabilitiesPathThatIsGone)
+TEST_F(ElementCapabilitiesFaultTest, TheBuilderReportsACapabilitiesPathThatIsGone)
 {
     const std::string text = "CMPIObjectPath is NULL for EnabledLogicalElementCap";
     expectBuilderFailure({BrokerCall::addKey, KeyOfFirstCapabilities, FaultManner::lostHandle},
         "CMPIObjectPath is" + Gap + "NULL for EnabledLogicalElementCap", text, text);
 }
 
-TEST_F(ElementCapabilitiesFaultTest, anInstanceThatCannotBeMadeIsPassedOnAsItIs)
+TEST_F(ElementCapabilitiesFaultTest, AnInstanceThatCannotBeMadeIsPassedOnAsItIs)
 {
     for (const FaultManner manner : Undelivered) {
         const auto request = run(Instances, {BrokerCall::newInstance, 1, manner});
@@ -216,7 +216,7 @@ TEST_F(ElementCapabilitiesFaultTest, anInstanceThatCannotBeMadeIsPassedOnAsItIs)
     }
 }
 
-TEST_F(ElementCapabilitiesFaultTest, anInstanceThatCannotBeMadeIsPassedOverInASearch)
+TEST_F(ElementCapabilitiesFaultTest, AnInstanceThatCannotBeMadeIsPassedOverInASearch)
 {
     for (const FaultManner manner : Undelivered) {
         const auto request = run(OneInstance, {BrokerCall::newInstance, 1, manner});
@@ -226,7 +226,7 @@ TEST_F(ElementCapabilitiesFaultTest, anInstanceThatCannotBeMadeIsPassedOverInASe
     }
 }
 
-TEST_F(ElementCapabilitiesFaultTest, anAssociatorThatCannotBeMadeIsPassedOnAsItIs)
+TEST_F(ElementCapabilitiesFaultTest, AnAssociatorThatCannotBeMadeIsPassedOnAsItIs)
 {
     for (const FaultManner manner : Undelivered)
         for (const auto* const kinds : {FromSensor, FromCapabilities}) {
@@ -237,14 +237,14 @@ TEST_F(ElementCapabilitiesFaultTest, anAssociatorThatCannotBeMadeIsPassedOnAsItI
 }
 
 // The status of the request is not handed over where an instance is asked for its path.
-TEST_F(ElementCapabilitiesFaultTest, aPathThatIsNotToldLeavesTheStatus)
+TEST_F(ElementCapabilitiesFaultTest, APathThatIsNotToldLeavesTheStatus)
 {
     const Fault fault = {BrokerCall::getObjectPath, 2, FaultManner::nullResult}; // the last
     for (const RequestKind& kind : {OneInstance, FromCapabilities[ReferenceNames]})
         EXPECT_EQ(run(kind, fault)->status.rc, CMPI_RC_OK) << kind;
 }
 
-TEST_F(ElementCapabilitiesFaultTest, theFilterIsSetBeforeTheReferences)
+TEST_F(ElementCapabilitiesFaultTest, TheFilterIsSetBeforeTheReferences)
 {
     run(Instances, {BrokerCall::setPropertyFilter, 1, FaultManner::errorStatus});
     const std::vector<BrokerCall>& calls = faulty_->calls();
@@ -252,7 +252,7 @@ TEST_F(ElementCapabilitiesFaultTest, theFilterIsSetBeforeTheReferences)
         std::find(calls.begin(), calls.end(), BrokerCall::setProperty));
 }
 
-TEST_F(ElementCapabilitiesFaultTest, aPathThatCannotCountItsKeysHasNone)
+TEST_F(ElementCapabilitiesFaultTest, APathThatCannotCountItsKeysHasNone)
 {
     const auto request = run(OneInstance, {BrokerCall::getKeyCount, 1, FaultManner::nullResult});
     EXPECT_EQ(request->status.rc, CMPI_RC_ERR_FAILED);
@@ -263,7 +263,7 @@ TEST_F(ElementCapabilitiesFaultTest, aPathThatCannotCountItsKeysHasNone)
 // ---- Associated objects. The first path that is made is the target; for references the
 // ---- association's follows, and then come the far ends. ----
 
-TEST_F(ElementCapabilitiesFaultTest, aTargetThatCannotBeMadeIsNoTarget)
+TEST_F(ElementCapabilitiesFaultTest, ATargetThatCannotBeMadeIsNoTarget)
 {
     const std::string names[] = {"Associators", "AssociatorsNames", "References", "ReferenceNames"};
     for (const FaultManner manner : Undelivered)
@@ -278,7 +278,7 @@ TEST_F(ElementCapabilitiesFaultTest, aTargetThatCannotBeMadeIsNoTarget)
 }
 
 // The ends of the paths and the trace line with which a fetch of them ends.
-TEST_F(ElementCapabilitiesFaultTest, farEndsThatCannotBeMadeEndInTheFactorysStatus)
+TEST_F(ElementCapabilitiesFaultTest, FarEndsThatCannotBeMadeEndInTheFactorysStatus)
 {
     const std::string functions[] = {"", "SensorElementCapabilities_AssociatorNames",
         "SensorElementCapabilities_References", "SensorElementCapabilities_ReferenceNames"};
@@ -303,7 +303,7 @@ TEST_F(ElementCapabilitiesFaultTest, farEndsThatCannotBeMadeEndInTheFactorysStat
         }
 }
 
-TEST_F(ElementCapabilitiesFaultTest, withoutAnAssociationPathThereAreNoReferences)
+TEST_F(ElementCapabilitiesFaultTest, WithoutAnAssociationPathThereAreNoReferences)
 {
     for (const FaultManner manner : Undelivered)
         for (const Which which : {References, ReferenceNames}) {
@@ -320,7 +320,7 @@ TEST_F(ElementCapabilitiesFaultTest, withoutAnAssociationPathThereAreNoReference
         }
 }
 
-TEST_F(ElementCapabilitiesFaultTest, aReferenceThatCannotBeMadeIsLeftOut)
+TEST_F(ElementCapabilitiesFaultTest, AReferenceThatCannotBeMadeIsLeftOut)
 {
     for (const FaultManner manner : Undelivered)
         for (const Which which : {References, ReferenceNames}) {
@@ -331,7 +331,7 @@ TEST_F(ElementCapabilitiesFaultTest, aReferenceThatCannotBeMadeIsLeftOut)
         }
 }
 
-TEST_F(ElementCapabilitiesFaultTest, aReferenceWhosePathIsNotToldIsLeftOutOfTheNames)
+TEST_F(ElementCapabilitiesFaultTest, AReferenceWhosePathIsNotToldIsLeftOutOfTheNames)
 {
     for (const FaultManner manner : Undelivered) {
         const auto request =
@@ -341,7 +341,7 @@ TEST_F(ElementCapabilitiesFaultTest, aReferenceWhosePathIsNotToldIsLeftOutOfTheN
     }
 }
 
-TEST_F(ElementCapabilitiesFaultTest, aMissingArrayStandsInTheStatusBesideTheAssociator)
+TEST_F(ElementCapabilitiesFaultTest, AMissingArrayStandsInTheStatusBesideTheAssociator)
 {
     const auto request = run(
         FromSensor[Associators], {BrokerCall::newArray, 1, FaultManner::nullResult, CMPI_RC_OK});

@@ -42,7 +42,7 @@ protected:
 
 // ---- EnumInstanceNames ----
 
-TEST_F(ElementCapabilitiesInstanceTest, namesArePairsOfEachSensorInOrder)
+TEST_F(ElementCapabilitiesInstanceTest, NamesArePairsOfEachSensorInOrder)
 {
     expectOk(enumerateNames(path(Class)));
     EXPECT_THAT(pairs(), ElementsAre("A:/1 " + Cap, "B:/2 " + Cap, "C:/3 " + Cap));
@@ -50,7 +50,7 @@ TEST_F(ElementCapabilitiesInstanceTest, namesArePairsOfEachSensorInOrder)
     EXPECT_THAT(messages_, IsEmpty());
 }
 
-TEST_F(ElementCapabilitiesInstanceTest, aNameIsAPathInTheRequestsNamespaceOnThisSystem)
+TEST_F(ElementCapabilitiesInstanceTest, ANameIsAPathInTheRequestsNamespaceOnThisSystem)
 {
     expectOk(enumerateNames(path(Class, {}, "root/other")));
     ASSERT_EQ(answer_.paths().size(), 3U);
@@ -63,13 +63,13 @@ TEST_F(ElementCapabilitiesInstanceTest, aNameIsAPathInTheRequestsNamespaceOnThis
             "Capabilities = ref " + capabilities("root/other").toText()));
 }
 
-TEST_F(ElementCapabilitiesOfOneSensorTest, hasOneName)
+TEST_F(ElementCapabilitiesOfOneSensorTest, HasOneName)
 {
     expectOk(enumerateNames(path(Class)));
     EXPECT_THAT(pairs(), ElementsAre("C:/3 " + Cap));
 }
 
-TEST_F(ElementCapabilitiesOfNoSensorTest, hasNoNamesInAClosedResult)
+TEST_F(ElementCapabilitiesOfNoSensorTest, HasNoNamesInAClosedResult)
 {
     expectOk(enumerateNames(path(Class)));
     expectNothing(true);
@@ -77,7 +77,7 @@ TEST_F(ElementCapabilitiesOfNoSensorTest, hasNoNamesInAClosedResult)
         ElementsAre(BrokerMessage{1, "SensorProfileProvider", "***No instance found***"}));
 }
 
-TEST_F(ElementCapabilitiesInstanceTest, withoutABrokerNamesFailWithoutAMessage)
+TEST_F(ElementCapabilitiesInstanceTest, WithoutABrokerNamesFailWithoutAMessage)
 {
     SensorElementCapabilitiesProvider_Create_AssociationMI(nullptr, nullptr, nullptr);
     const CMPIStatus status = enumerateNames(path(Class));
@@ -88,7 +88,7 @@ TEST_F(ElementCapabilitiesInstanceTest, withoutABrokerNamesFailWithoutAMessage)
 
 // ---- EnumInstances ----
 
-TEST_F(ElementCapabilitiesInstanceTest, instancesArePairsOfEachSensorInOrder)
+TEST_F(ElementCapabilitiesInstanceTest, InstancesArePairsOfEachSensorInOrder)
 {
     expectOk(enumerate(path(Class, {}, "root/other")));
     EXPECT_THAT(pairs(), ElementsAre("A:/1 " + Cap, "B:/2 " + Cap, "C:/3 " + Cap));
@@ -103,7 +103,7 @@ TEST_F(ElementCapabilitiesInstanceTest, instancesArePairsOfEachSensorInOrder)
     EXPECT_THAT(messages_, IsEmpty());
 }
 
-TEST_F(ElementCapabilitiesOfNoSensorTest, hasNoInstancesInAClosedResult)
+TEST_F(ElementCapabilitiesOfNoSensorTest, HasNoInstancesInAClosedResult)
 {
     expectOk(enumerate(path(Class)));
     expectNothing(true);
@@ -115,7 +115,7 @@ TEST_F(ElementCapabilitiesOfNoSensorTest, hasNoInstancesInAClosedResult)
 }
 
 // The broker that knows the class keeps its keys whatever the filter says.
-TEST_F(ElementCapabilitiesInstanceTest, aPropertyListKeepsTheKeysOfAClassThatIsKnown)
+TEST_F(ElementCapabilitiesInstanceTest, APropertyListKeepsTheKeysOfAClassThatIsKnown)
 {
     const char* properties[] = {"Characteristics", nullptr};
     expectOk(enumerate(path(Class), properties));
@@ -125,7 +125,7 @@ TEST_F(ElementCapabilitiesInstanceTest, aPropertyListKeepsTheKeysOfAClassThatIsK
 }
 
 // The filter's own keys are no properties of the class.
-TEST_F(ElementCapabilitiesInstanceTest, aPropertyListDecidesWhereTheClassIsNotKnown)
+TEST_F(ElementCapabilitiesInstanceTest, APropertyListDecidesWhereTheClassIsNotKnown)
 {
     broker_.setClassInformation(nullptr);
     const char* properties[] = {"Capabilities", nullptr};
@@ -135,7 +135,7 @@ TEST_F(ElementCapabilitiesInstanceTest, aPropertyListDecidesWhereTheClassIsNotKn
         EXPECT_THAT(namesOf(instance->properties()), ElementsAre("Capabilities"));
 }
 
-TEST_F(ElementCapabilitiesInstanceTest, theFilterNamesAntecedentAndDependentAsKeys)
+TEST_F(ElementCapabilitiesInstanceTest, TheFilterNamesAntecedentAndDependentAsKeys)
 {
     static std::vector<std::string> keys;
     keys.clear();
@@ -152,7 +152,7 @@ TEST_F(ElementCapabilitiesInstanceTest, theFilterNamesAntecedentAndDependentAsKe
                           "Antecedent", "Dependent"));
 }
 
-TEST_F(ElementCapabilitiesInstanceTest, theBuilderKeepsWhatIsThereAndSaysWhetherItFailed)
+TEST_F(ElementCapabilitiesInstanceTest, TheBuilderKeepsWhatIsThereAndSaysWhetherItFailed)
 {
     std::vector<CMPIInstance*> instances = {nullptr};
     using Vorn::SensorProfileProvider::sensorElementCapabilitiesCMPIInstances;
@@ -166,7 +166,7 @@ TEST_F(ElementCapabilitiesInstanceTest, theBuilderKeepsWhatIsThereAndSaysWhether
 
 // ---- GetInstance ----
 
-TEST_F(ElementCapabilitiesInstanceTest, anInstanceIsFoundByItsReferences)
+TEST_F(ElementCapabilitiesInstanceTest, AnInstanceIsFoundByItsReferences)
 {
     expectOk(get(pairPath(sensor("B:/2"), capabilities())));
     EXPECT_THAT(pairs(), ElementsAre("B:/2 " + Cap));
@@ -174,14 +174,14 @@ TEST_F(ElementCapabilitiesInstanceTest, anInstanceIsFoundByItsReferences)
     EXPECT_THAT(messages_, IsEmpty());
 }
 
-TEST_F(ElementCapabilitiesInstanceTest, anInstanceIsFoundWithAPropertyListToo)
+TEST_F(ElementCapabilitiesInstanceTest, AnInstanceIsFoundWithAPropertyListToo)
 {
     const char* properties[] = {"Capabilities", nullptr};
     expectOk(get(pairPath(sensor("B:/2"), capabilities()), properties));
     EXPECT_THAT(pairs(), ElementsAre("B:/2 " + Cap));
 }
 
-TEST_F(ElementCapabilitiesInstanceTest, theOrderOfTheKeysDoesNotMatter)
+TEST_F(ElementCapabilitiesInstanceTest, TheOrderOfTheKeysDoesNotMatter)
 {
     Host::ObjectPath& ref = path(Class);
     ref.addKey("Capabilities", Host::Value::of(capabilities()));
@@ -192,7 +192,7 @@ TEST_F(ElementCapabilitiesInstanceTest, theOrderOfTheKeysDoesNotMatter)
     EXPECT_THAT(got(ref), ElementsAre("C:/3 " + Cap));
 }
 
-TEST_F(ElementCapabilitiesInstanceTest, theLetterCaseOfNamesDoesNotMatter)
+TEST_F(ElementCapabilitiesInstanceTest, TheLetterCaseOfNamesDoesNotMatter)
 {
     Host::ObjectPath& ref = path("zumlo_sensorelementcapabilities");
     ref.addKey("MANAGEDELEMENT",
@@ -204,7 +204,7 @@ TEST_F(ElementCapabilitiesInstanceTest, theLetterCaseOfNamesDoesNotMatter)
     EXPECT_THAT(got(ref), ElementsAre("A:/1 " + Cap));
 }
 
-TEST_F(ElementCapabilitiesInstanceTest, hostsAndAbsentNamespacesDoNotMatter)
+TEST_F(ElementCapabilitiesInstanceTest, HostsAndAbsentNamespacesDoNotMatter)
 {
     for (const char* const host : {static_cast<const char*>(nullptr), "elsewhere"})
         for (const char* const nameSpace : {static_cast<const char*>(nullptr), NameSpace}) {
@@ -220,7 +220,7 @@ TEST_F(ElementCapabilitiesInstanceTest, hostsAndAbsentNamespacesDoNotMatter)
         }
 }
 
-TEST_F(ElementCapabilitiesInstanceTest, otherValuesAreAClosedEmptyAnswer)
+TEST_F(ElementCapabilitiesInstanceTest, OtherValuesAreAClosedEmptyAnswer)
 {
     EXPECT_THAT(got(pairPath(sensor("a:/1"), capabilities())), IsEmpty());
     EXPECT_THAT(got(pairPath(sensor("D:/4"), capabilities())), IsEmpty());
@@ -232,7 +232,7 @@ TEST_F(ElementCapabilitiesInstanceTest, otherValuesAreAClosedEmptyAnswer)
     EXPECT_THAT(messages_, IsEmpty());
 }
 
-TEST_F(ElementCapabilitiesInstanceTest, oneReferenceAloneOrOneTooManyFindsNothing)
+TEST_F(ElementCapabilitiesInstanceTest, OneReferenceAloneOrOneTooManyFindsNothing)
 {
     Host::ObjectPath& half = path(Class);
     half.addKey("ManagedElement", Host::Value::of(sensor("A:/1")));
@@ -242,7 +242,7 @@ TEST_F(ElementCapabilitiesInstanceTest, oneReferenceAloneOrOneTooManyFindsNothin
     EXPECT_THAT(got(more), IsEmpty());
 }
 
-TEST_F(ElementCapabilitiesInstanceTest, aReferenceOfAnotherTypeFindsNothing)
+TEST_F(ElementCapabilitiesInstanceTest, AReferenceOfAnotherTypeFindsNothing)
 {
     Host::Arena& arena = request_->arena();
     const Host::Value good = Host::Value::of(capabilities());
@@ -257,14 +257,14 @@ TEST_F(ElementCapabilitiesInstanceTest, aReferenceOfAnotherTypeFindsNothing)
     EXPECT_THAT(got(pairPath(element, capabilities())), IsEmpty());
 }
 
-TEST_F(ElementCapabilitiesInstanceTest, aPathWithoutKeysIsRefusedInAClosedResult)
+TEST_F(ElementCapabilitiesInstanceTest, APathWithoutKeysIsRefusedInAClosedResult)
 {
     expectFailure(get(path(Class)), NoKeyText);
     expectNothing(true);
     EXPECT_THAT(messages_, ElementsAre(BrokerMessage{2, Provider, NoKeyText}));
 }
 
-TEST_F(ElementCapabilitiesInstanceTest, aRefusalHasNoMessageWithoutABroker)
+TEST_F(ElementCapabilitiesInstanceTest, ARefusalHasNoMessageWithoutABroker)
 {
     SensorElementCapabilitiesProvider_Create_AssociationMI(nullptr, nullptr, nullptr);
     const CMPIStatus status = get(path(Class));
@@ -274,7 +274,7 @@ TEST_F(ElementCapabilitiesInstanceTest, aRefusalHasNoMessageWithoutABroker)
     EXPECT_TRUE(answer_.isDone());
 }
 
-TEST_F(ElementCapabilitiesOfNoSensorTest, findsNoInstance)
+TEST_F(ElementCapabilitiesOfNoSensorTest, FindsNoInstance)
 {
     EXPECT_THAT(got(pairPath(sensor("A:/1"), capabilities())), IsEmpty());
 }

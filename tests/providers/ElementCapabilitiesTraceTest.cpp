@@ -43,7 +43,7 @@ protected:
 // ---- Instances ----
 
 // The capabilities are fetched anew for each of the two sensors.
-TEST_F(ElementCapabilitiesTraceTest, ofEnumeratedNames)
+TEST_F(ElementCapabilitiesTraceTest, OfEnumeratedNames)
 {
     const HandlerLines lines = handler("SensorElementCapabilities_EnumInstanceNames");
     const Host::ObjectPath& ref = path(Class);
@@ -52,7 +52,7 @@ TEST_F(ElementCapabilitiesTraceTest, ofEnumeratedNames)
             {lines.entry(), Built, counted(), SensorPaths, CapPaths, CapPaths, lines.exit()})));
 }
 
-TEST_F(ElementCapabilitiesEmptyTraceTest, ofNamesWithoutSensors)
+TEST_F(ElementCapabilitiesEmptyTraceTest, OfNamesWithoutSensors)
 {
     const HandlerLines lines = handler("SensorElementCapabilities_EnumInstanceNames");
     const Host::ObjectPath& ref = path(Class);
@@ -61,7 +61,7 @@ TEST_F(ElementCapabilitiesEmptyTraceTest, ofNamesWithoutSensors)
             sequence({lines.entry(), BuiltWithoutSensors, counted(), SensorPaths, lines.exit()})));
 }
 
-TEST_F(ElementCapabilitiesTraceTest, ofEnumeratedInstances)
+TEST_F(ElementCapabilitiesTraceTest, OfEnumeratedInstances)
 {
     const HandlerLines lines = handler("SensorElementCapabilities_EnumInstances");
     const Host::ObjectPath& ref = path(Class);
@@ -70,7 +70,7 @@ TEST_F(ElementCapabilitiesTraceTest, ofEnumeratedInstances)
             SensorPaths, CapPaths, CapPaths, Builder.exit(), lines.exit()})));
 }
 
-TEST_F(ElementCapabilitiesEmptyTraceTest, ofInstancesWithoutSensors)
+TEST_F(ElementCapabilitiesEmptyTraceTest, OfInstancesWithoutSensors)
 {
     const HandlerLines lines = handler("SensorElementCapabilities_EnumInstances");
     const Host::ObjectPath& ref = path(Class);
@@ -80,7 +80,7 @@ TEST_F(ElementCapabilitiesEmptyTraceTest, ofInstancesWithoutSensors)
             Builder.exit(), lines.exit()})));
 }
 
-TEST_F(ElementCapabilitiesTraceTest, ofAnInstanceSearched)
+TEST_F(ElementCapabilitiesTraceTest, OfAnInstanceSearched)
 {
     const HandlerLines lines = handler("SensorElementCapabilities_GetInstance");
     const Host::ObjectPath& ref = path(Class, {{"Other", "x"}});
@@ -89,7 +89,7 @@ TEST_F(ElementCapabilitiesTraceTest, ofAnInstanceSearched)
             SensorPaths, CapPaths, CapPaths, Builder.exit(), lines.exit()})));
 }
 
-TEST_F(ElementCapabilitiesTraceTest, ofARequestWithoutKeysHasNoFactory)
+TEST_F(ElementCapabilitiesTraceTest, OfARequestWithoutKeysHasNoFactory)
 {
     const HandlerLines lines = handler("SensorElementCapabilities_GetInstance");
     const Host::ObjectPath& ref = path(Class);
@@ -100,7 +100,7 @@ TEST_F(ElementCapabilitiesTraceTest, ofARequestWithoutKeysHasNoFactory)
 
 // ---- Associated objects ----
 
-TEST_F(ElementCapabilitiesTraceTest, ofTheAssociatorsOfCapabilities)
+TEST_F(ElementCapabilitiesTraceTest, OfTheAssociatorsOfCapabilities)
 {
     const HandlerLines lines = handler("SensorElementCapabilities_Associators");
     const Host::ObjectPath& source = capabilities();
@@ -111,7 +111,7 @@ TEST_F(ElementCapabilitiesTraceTest, ofTheAssociatorsOfCapabilities)
             lines.exit()})));
 }
 
-TEST_F(ElementCapabilitiesTraceTest, ofTheAssociatorsOfASensor)
+TEST_F(ElementCapabilitiesTraceTest, OfTheAssociatorsOfASensor)
 {
     const HandlerLines lines = handler("SensorElementCapabilities_Associators");
     const Host::ObjectPath& source = sensor("B:/2");
@@ -122,7 +122,7 @@ TEST_F(ElementCapabilitiesTraceTest, ofTheAssociatorsOfASensor)
             lines.exit()})));
 }
 
-TEST_F(ElementCapabilitiesTraceTest, ofTheNamesOfAssociators)
+TEST_F(ElementCapabilitiesTraceTest, OfTheNamesOfAssociators)
 {
     const HandlerLines lines = handler("SensorElementCapabilities_AssociatorNames");
     const Host::ObjectPath& source = sensor("B:/2");
@@ -131,7 +131,7 @@ TEST_F(ElementCapabilitiesTraceTest, ofTheNamesOfAssociators)
             CapPaths, lines.exit()})));
 }
 
-TEST_F(ElementCapabilitiesTraceTest, ofATargetThatNobodyHereLeadsTo)
+TEST_F(ElementCapabilitiesTraceTest, OfATargetThatNobodyHereLeadsTo)
 {
     const Host::ObjectPath& source = sensor("B:/2");
     const char* const other = "ZUMLO_SensorSystemDevice";
@@ -146,7 +146,7 @@ TEST_F(ElementCapabilitiesTraceTest, ofATargetThatNobodyHereLeadsTo)
         ElementsAreArray(expected("SensorElementCapabilities_AssociatorNames")));
 }
 
-TEST_F(ElementCapabilitiesTraceTest, ofReferences)
+TEST_F(ElementCapabilitiesTraceTest, OfReferences)
 {
     const HandlerLines instances = handler("SensorElementCapabilities_References");
     const HandlerLines names = handler("SensorElementCapabilities_ReferenceNames");
@@ -159,7 +159,7 @@ TEST_F(ElementCapabilitiesTraceTest, ofReferences)
             SensorPaths, names.exit()})));
 }
 
-TEST_F(ElementCapabilitiesEmptyTraceTest, ofSensorsThatAreNotThere)
+TEST_F(ElementCapabilitiesEmptyTraceTest, OfSensorsThatAreNotThere)
 {
     const Host::ObjectPath& source = capabilities();
     const auto expected = [](const std::string& function) {
@@ -176,7 +176,7 @@ TEST_F(ElementCapabilitiesEmptyTraceTest, ofSensorsThatAreNotThere)
         ElementsAreArray(expected("SensorElementCapabilities_ReferenceNames")));
 }
 
-TEST_F(ElementCapabilitiesTraceTest, ofASourceWithoutTarget)
+TEST_F(ElementCapabilitiesTraceTest, OfASourceWithoutTarget)
 {
     const Host::ObjectPath& source = system("host");
     const auto expected = [](const std::string& request, const std::string& text) {

@@ -65,7 +65,7 @@ INSTANTIATE_TEST_SUITE_P(
 INSTANTIATE_TEST_SUITE_P(All, AssociationEntryTest, ::testing::ValuesIn(AssociationEntries),
     entryName<AssociationEntry>);
 
-TEST_P(InstanceEntryTest, theTableHasItsVersionsNameAndHandlers)
+TEST_P(InstanceEntryTest, TheTableHasItsVersionsNameAndHandlers)
 {
     const CMPIInstanceMI* const mi = create();
     EXPECT_EQ(mi->hdl, nullptr);
@@ -78,7 +78,7 @@ TEST_P(InstanceEntryTest, theTableHasItsVersionsNameAndHandlers)
     EXPECT_NE(mi->ft->getInstance, nullptr);
 }
 
-TEST_P(AssociationEntryTest, theTableHasItsVersionsNameAndHandlers)
+TEST_P(AssociationEntryTest, TheTableHasItsVersionsNameAndHandlers)
 {
     const CMPIAssociationMI* const mi = create();
     EXPECT_EQ(mi->hdl, nullptr);
@@ -100,12 +100,12 @@ void expectTheSameRecordAtEveryCall(const Entry& entry)
     EXPECT_EQ(entry.factory(&other, nullptr, nullptr), first);
 }
 
-TEST_P(InstanceEntryTest, everyCallReturnsTheSameRecord)
+TEST_P(InstanceEntryTest, EveryCallReturnsTheSameRecord)
 {
     expectTheSameRecordAtEveryCall(GetParam());
 }
 
-TEST_P(AssociationEntryTest, everyCallReturnsTheSameRecord)
+TEST_P(AssociationEntryTest, EveryCallReturnsTheSameRecord)
 {
     expectTheSameRecordAtEveryCall(GetParam());
 }
@@ -118,12 +118,12 @@ void expectAnUntouchedStatus(const Entry& entry)
     EXPECT_EQ(status.rc, CMPI_RC_ERR_ACCESS_DENIED);
 }
 
-TEST_P(InstanceEntryTest, theStatusIsNotWritten)
+TEST_P(InstanceEntryTest, TheStatusIsNotWritten)
 {
     expectAnUntouchedStatus(GetParam());
 }
 
-TEST_P(AssociationEntryTest, theStatusIsNotWritten)
+TEST_P(AssociationEntryTest, TheStatusIsNotWritten)
 {
     expectAnUntouchedStatus(GetParam());
 }
@@ -134,7 +134,7 @@ void expectStatus(const CMPIStatus& status, CMPIrc code)
     EXPECT_EQ(status.msg, nullptr);
 }
 
-TEST_P(InstanceEntryTest, cleanupIsOkWhetherTerminatingOrNotAndSilent)
+TEST_P(InstanceEntryTest, CleanupIsOkWhetherTerminatingOrNotAndSilent)
 {
     const Testing::LogCapture capture;
     CMPIInstanceMI* const mi = create();
@@ -143,7 +143,7 @@ TEST_P(InstanceEntryTest, cleanupIsOkWhetherTerminatingOrNotAndSilent)
     EXPECT_TRUE(capture.log().empty());
 }
 
-TEST_P(AssociationEntryTest, cleanupIsOkWhetherTerminatingOrNotAndSilent)
+TEST_P(AssociationEntryTest, CleanupIsOkWhetherTerminatingOrNotAndSilent)
 {
     const Testing::LogCapture capture;
     CMPIAssociationMI* const mi = create();
@@ -152,7 +152,7 @@ TEST_P(AssociationEntryTest, cleanupIsOkWhetherTerminatingOrNotAndSilent)
     EXPECT_TRUE(capture.log().empty());
 }
 
-TEST_P(InstanceEntryTest, writingAndQueryingAreNotSupportedWhateverTheArgumentsAndSilent)
+TEST_P(InstanceEntryTest, WritingAndQueryingAreNotSupportedWhateverTheArgumentsAndSilent)
 {
     const Testing::LogCapture capture;
     CMPIInstanceMI* const mi = create();

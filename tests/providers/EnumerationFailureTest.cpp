@@ -66,7 +66,7 @@ HandlerLines capabilitiesHandler(const std::string& request)
     return {module, module, "SensorEnabledLogicalElementCapabilities_" + request};
 }
 
-TEST_F(EnumerationFailureTest, endsAnEnumerationOfSensors)
+TEST_F(EnumerationFailureTest, EndsAnEnumerationOfSensors)
 {
     const HandlerLines lines = sensorHandler("EnumInstances");
     EXPECT_THAT(traceOfEnumeration(sensors_),
@@ -75,7 +75,7 @@ TEST_F(EnumerationFailureTest, endsAnEnumerationOfSensors)
     expectGivenUp();
 }
 
-TEST_F(EnumerationFailureTest, endsTheSearchForASensor)
+TEST_F(EnumerationFailureTest, EndsTheSearchForASensor)
 {
     const HandlerLines lines = sensorHandler("GetInstance");
     EXPECT_THAT(traceOfSearch(sensors_),
@@ -84,7 +84,7 @@ TEST_F(EnumerationFailureTest, endsTheSearchForASensor)
     expectGivenUp();
 }
 
-TEST_F(EnumerationFailureTest, endsAnEnumerationOfCapabilities)
+TEST_F(EnumerationFailureTest, EndsAnEnumerationOfCapabilities)
 {
     const HandlerLines lines = capabilitiesHandler("EnumInstances");
     EXPECT_THAT(traceOfEnumeration(capabilities_),
@@ -94,7 +94,7 @@ TEST_F(EnumerationFailureTest, endsAnEnumerationOfCapabilities)
     expectGivenUp();
 }
 
-TEST_F(EnumerationFailureTest, endsTheSearchForCapabilities)
+TEST_F(EnumerationFailureTest, EndsTheSearchForCapabilities)
 {
     const HandlerLines lines = capabilitiesHandler("GetInstance");
     EXPECT_THAT(traceOfSearch(capabilities_),

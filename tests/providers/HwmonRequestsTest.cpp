@@ -30,7 +30,7 @@ constexpr const char* chip = "hwmon/hwmon1"; // the one that is unplugged
 constexpr const char* chipsSensor = "/hwmon/nvme-pci-0200/temp1";
 constexpr std::uint64_t lostCommunication = 13;
 
-class HwmonRequests : public Testing::MountNamespaceTest {
+class HwmonRequestsTest : public Testing::MountNamespaceTest {
 protected:
     // By device identifier.
     std::map<std::string, std::int64_t> readings()
@@ -64,7 +64,7 @@ private:
         SensorProfileProvider_Create_InstanceMI(broker_.handle(), nullptr, nullptr);
 };
 
-TEST_F(HwmonRequests, eightThreadsEnumerateTrueReadingsWhileChipsComeAndGo)
+TEST_F(HwmonRequestsTest, EightThreadsEnumerateTrueReadingsWhileChipsComeAndGo)
 {
     BoundSysfs sysfs("hotplug");
     const auto whole = readings();
@@ -97,7 +97,7 @@ TEST_F(HwmonRequests, eightThreadsEnumerateTrueReadingsWhileChipsComeAndGo)
     EXPECT_EQ(readings(), whole);
 }
 
-TEST_F(HwmonRequests, aChipThatIsGoneIsNotInTheNextAnswer)
+TEST_F(HwmonRequestsTest, AChipThatIsGoneIsNotInTheNextAnswer)
 {
     BoundSysfs sysfs("hotplug");
     ASSERT_EQ(readings().size(), 3U);

@@ -105,13 +105,13 @@ TEST_F(SystemDeviceOfManyPairsTest, ASensorHasAsManyReferencesAsTheCountOfItsSys
     EXPECT_EQ(answer_.paths().size(), 65537U);
 }
 
-TEST_F(ElementCapabilitiesOf65536SensorsTest, thereAreNoPairs)
+TEST_F(ElementCapabilitiesOf65536SensorsTest, ThereAreNoPairs)
 {
     expectOk(enumerateNames(path(ElementCapabilities)));
     expectNothing(true);
 }
 
-TEST_F(ElementCapabilitiesOf65537SensorsTest, thereIsOnePairAndOneFarEnd)
+TEST_F(ElementCapabilitiesOf65537SensorsTest, ThereIsOnePairAndOneFarEnd)
 {
     expectOk(associatorNames(capabilities()));
     EXPECT_THAT(delivered(), ElementsAre("F:/100000"));
@@ -121,7 +121,7 @@ TEST_F(ElementCapabilitiesOf65537SensorsTest, thereIsOnePairAndOneFarEnd)
     EXPECT_EQ(answer_.instances().size(), 1U);
 }
 
-TEST_F(SystemDeviceOf65537SensorsTest, thereIsOnePairForEachSystem)
+TEST_F(SystemDeviceOf65537SensorsTest, ThereIsOnePairForEachSystem)
 {
     expectOk(associatorNames(system("host")));
     EXPECT_THAT(delivered(), ElementsAre("F:/100000"));

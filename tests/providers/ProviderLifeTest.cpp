@@ -109,7 +109,7 @@ constexpr auto moduleName = [](const auto& info) { return info.param.name; };
 INSTANTIATE_TEST_SUITE_P(EveryModule, ProviderLifeTest,
     ::testing::Values(Sensors, Capabilities, ElementCapabilities, SystemDevice), moduleName);
 
-TEST_P(ProviderLifeTest, aRequestAfterCleanupIsServedAsBefore)
+TEST_P(ProviderLifeTest, ARequestAfterCleanupIsServedAsBefore)
 {
     CMPIInstanceMI* const instances = GetParam().instances(first_.handle(), nullptr, nullptr);
     for (const CMPIBoolean terminating : {CMPIBoolean{0}, CMPIBoolean{1}}) {
@@ -118,7 +118,7 @@ TEST_P(ProviderLifeTest, aRequestAfterCleanupIsServedAsBefore)
     }
 }
 
-TEST_P(ProviderLifeTest, writingAndQueryingTouchNoResultAndWriteNoLine)
+TEST_P(ProviderLifeTest, WritingAndQueryingTouchNoResultAndWriteNoLine)
 {
     CMPIInstanceMI* const mi = GetParam().instances(broker(), nullptr, nullptr);
     const CMPIObjectPath* const ref = sensor();
@@ -140,7 +140,7 @@ class BothKindsTest : public ProviderLifeTest {};
 INSTANTIATE_TEST_SUITE_P(
     BothModules, BothKindsTest, ::testing::Values(ElementCapabilities, SystemDevice), moduleName);
 
-TEST_P(BothKindsTest, aRequestForAssociationsAfterCleanupIsServedAsBefore)
+TEST_P(BothKindsTest, ARequestForAssociationsAfterCleanupIsServedAsBefore)
 {
     CMPIAssociationMI* const associations =
         GetParam().associations(first_.handle(), nullptr, nullptr);
@@ -150,7 +150,7 @@ TEST_P(BothKindsTest, aRequestForAssociationsAfterCleanupIsServedAsBefore)
     }
 }
 
-TEST_P(BothKindsTest, theAssociationFactorysBrokerIsAlsoThatOfTheInstances)
+TEST_P(BothKindsTest, TheAssociationFactorysBrokerIsAlsoThatOfTheInstances)
 {
     CMPIInstanceMI* const instances = GetParam().instances(first_.handle(), nullptr, nullptr);
     CMPIAssociationMI* const associations =
@@ -159,7 +159,7 @@ TEST_P(BothKindsTest, theAssociationFactorysBrokerIsAlsoThatOfTheInstances)
     expectRequestOf(associations, second_);
 }
 
-TEST_P(BothKindsTest, theInstanceFactorysBrokerIsAlsoThatOfTheAssociations)
+TEST_P(BothKindsTest, TheInstanceFactorysBrokerIsAlsoThatOfTheAssociations)
 {
     CMPIAssociationMI* const associations =
         GetParam().associations(first_.handle(), nullptr, nullptr);
@@ -168,7 +168,7 @@ TEST_P(BothKindsTest, theInstanceFactorysBrokerIsAlsoThatOfTheAssociations)
     expectRequestOf(instances, second_);
 }
 
-TEST_P(BothKindsTest, cleaningUpAssociationsWritesNoLine)
+TEST_P(BothKindsTest, CleaningUpAssociationsWritesNoLine)
 {
     CMPIAssociationMI* const associations = GetParam().associations(broker(), nullptr, nullptr);
     const LogCapture capture;

@@ -80,7 +80,7 @@ protected:
     CMPIStatus status_ = {CMPI_RC_ERR_FAILED, nullptr};
 };
 
-TEST_F(SearchTest, theInstanceWhosePathEqualsTheRequestsIsReturnedOnce)
+TEST_F(SearchTest, TheInstanceWhosePathEqualsTheRequestsIsReturnedOnce)
 {
     get("Core:/v");
     EXPECT_EQ(status_.rc, CMPI_RC_OK);
@@ -91,7 +91,7 @@ TEST_F(SearchTest, theInstanceWhosePathEqualsTheRequestsIsReturnedOnce)
     EXPECT_TRUE(answer_.isDone());
 }
 
-TEST_F(SearchTest, theInstanceFoundHasThePropertiesOfTheList)
+TEST_F(SearchTest, TheInstanceFoundHasThePropertiesOfTheList)
 {
     const char* properties[] = {"Name", nullptr};
     get("Core:/v", properties);
@@ -101,7 +101,7 @@ TEST_F(SearchTest, theInstanceFoundHasThePropertiesOfTheList)
             "CreationClassName", "DeviceID", "SystemCreationClassName", "SystemName", "Name"));
 }
 
-TEST_F(SearchTest, noInstanceIsFoundByThePathOfNone)
+TEST_F(SearchTest, NoInstanceIsFoundByThePathOfNone)
 {
     get("Core:/other");
     EXPECT_EQ(status_.rc, CMPI_RC_OK);
@@ -111,7 +111,7 @@ TEST_F(SearchTest, noInstanceIsFoundByThePathOfNone)
 
 // ---- Closed before they are left ----
 
-TEST_F(SensorProviderAnswerTest, theResultIsClosedBetweenTheMarks)
+TEST_F(SensorProviderAnswerTest, TheResultIsClosedBetweenTheMarks)
 {
     const ScriptedMachine machine(ThreeSensors);
     auto all = requests();
@@ -132,7 +132,7 @@ TEST_F(SensorProviderAnswerTest, theResultIsClosedBetweenTheMarks)
 
 // ---- Thrown out of ----
 
-TEST_F(SensorProviderAnswerTest, anExceptionThatIsNoStandardOneLeavesWithoutAnExitMark)
+TEST_F(SensorProviderAnswerTest, AnExceptionThatIsNoStandardOneLeavesWithoutAnExitMark)
 {
     const Testing::WatchedMachine machine([] { throw Testing::StrangeException(); });
     for (const auto& request : requests()) {

@@ -76,18 +76,18 @@ protected:
 INSTANTIATE_TEST_SUITE_P(NullOrHandleless, PathFailureTest,
     ::testing::Values(FaultManner::nullResult, FaultManner::handleless));
 
-TEST_P(PathFailureTest, anEnumerationOfNamesEndsAtTheFirstPathThatCannotBeMade)
+TEST_P(PathFailureTest, AnEnumerationOfNamesEndsAtTheFirstPathThatCannotBeMade)
 {
     for (const unsigned nth : {1U, 2U})
         expectFailedPath(*run(Operation::names, {BrokerCall::newObjectPath, nth, GetParam()}));
 }
 
-TEST_P(PathFailureTest, aNamespaceThatCannotBeReadIsAPathThatCannotBeMade)
+TEST_P(PathFailureTest, ANamespaceThatCannotBeReadIsAPathThatCannotBeMade)
 {
     expectFailedPath(*run(Operation::names, {BrokerCall::getNameSpace, 1, GetParam()}));
 }
 
-TEST_P(PathFailureTest, anInstanceWithoutAPathIsANullInstance)
+TEST_P(PathFailureTest, AnInstanceWithoutAPathIsANullInstance)
 {
     const auto request = run(Operation::instances, {BrokerCall::newObjectPath, 1, GetParam()});
     EXPECT_EQ(request->status.rc, CMPI_RC_OK);
@@ -97,7 +97,7 @@ TEST_P(PathFailureTest, anInstanceWithoutAPathIsANullInstance)
     EXPECT_TRUE(request->messages.empty());
 }
 
-TEST_P(PathFailureTest, anInstanceWhosePathIsNotToldEqualsNothing)
+TEST_P(PathFailureTest, AnInstanceWhosePathIsNotToldEqualsNothing)
 {
     const auto request = run(Operation::instanceByPath, {BrokerCall::getObjectPath, 1, GetParam()});
     EXPECT_EQ(request->answer.instances().size(), 0U);
@@ -139,7 +139,7 @@ protected:
 INSTANTIATE_TEST_SUITE_P(NullOrHandleless, ArrayFailureTest,
     ::testing::Values(FaultManner::nullResult, FaultManner::handleless));
 
-TEST_P(ArrayFailureTest, withoutPossibleStatesTheBuildGoesOn)
+TEST_P(ArrayFailureTest, WithoutPossibleStatesTheBuildGoesOn)
 {
     const LogCapture capture;
     const auto request = runWithout(PossibleStates);
@@ -158,7 +158,7 @@ TEST_P(ArrayFailureTest, withoutPossibleStatesTheBuildGoesOn)
                     "Line: 440]: Failed to create CMPIArray for PossibleStates"));
 }
 
-TEST_P(ArrayFailureTest, withoutSupportedThresholdsTheBuildEndsWithoutItsExitingLine)
+TEST_P(ArrayFailureTest, WithoutSupportedThresholdsTheBuildEndsWithoutItsExitingLine)
 {
     const LogCapture capture;
     const auto request = runWithout(SupportedThresholds);
@@ -169,7 +169,7 @@ TEST_P(ArrayFailureTest, withoutSupportedThresholdsTheBuildEndsWithoutItsExiting
     EXPECT_THAT(capture.marksOf("makeSensorInstance"), ElementsAre("ENTERING 269"));
 }
 
-TEST_P(ArrayFailureTest, withoutSettableThresholdsTheBuildEndsWithoutItsExitingLine)
+TEST_P(ArrayFailureTest, WithoutSettableThresholdsTheBuildEndsWithoutItsExitingLine)
 {
     const LogCapture capture;
     const auto request = runWithout(SettableThresholds);
@@ -180,7 +180,7 @@ TEST_P(ArrayFailureTest, withoutSettableThresholdsTheBuildEndsWithoutItsExitingL
     EXPECT_THAT(capture.marksOf("makeSensorInstance"), ElementsAre("ENTERING 269"));
 }
 
-TEST_P(ArrayFailureTest, withoutOperationalStatusTheBuildEndsWithAnExitingLineOfItsOwn)
+TEST_P(ArrayFailureTest, WithoutOperationalStatusTheBuildEndsWithAnExitingLineOfItsOwn)
 {
     const LogCapture capture;
     const auto request = runWithout(OperationalStatus);
@@ -191,7 +191,7 @@ TEST_P(ArrayFailureTest, withoutOperationalStatusTheBuildEndsWithAnExitingLineOf
     EXPECT_THAT(capture.marksOf("makeSensorInstance"), ElementsAre("ENTERING 269", "EXITING 615"));
 }
 
-TEST_P(ArrayFailureTest, inAnEnumerationLeavesTheOtherInstancesWhole)
+TEST_P(ArrayFailureTest, InAnEnumerationLeavesTheOtherInstancesWhole)
 {
     const auto request = run(
         Operation::instances, {BrokerCall::newArray, SupportedThresholds, GetParam(), CMPI_RC_OK});
@@ -202,7 +202,7 @@ TEST_P(ArrayFailureTest, inAnEnumerationLeavesTheOtherInstancesWhole)
     EXPECT_TRUE(request->answer.isDone());
 }
 
-TEST_F(SensorProviderFaultTest, theStatusThatTheBrokerLeftIsReturned)
+TEST_F(SensorProviderFaultTest, TheStatusThatTheBrokerLeftIsReturned)
 {
     const char* properties[] = {"PossibleStates", nullptr};
     const auto request = run(Operation::oneInstance,
@@ -212,7 +212,7 @@ TEST_F(SensorProviderFaultTest, theStatusThatTheBrokerLeftIsReturned)
     EXPECT_EQ(request->status.msg, nullptr);
 }
 
-TEST_F(SensorProviderFaultTest, aLabelThatCannotBeMadeIsAnEmptyElement)
+TEST_F(SensorProviderFaultTest, ALabelThatCannotBeMadeIsAnEmptyElement)
 {
     const char* properties[] = {"PossibleStates", nullptr};
     for (const auto& [manner, code] : std::initializer_list<std::pair<FaultManner, CMPIrc>>{
@@ -234,7 +234,7 @@ TEST_F(SensorProviderFaultTest, aLabelThatCannotBeMadeIsAnEmptyElement)
 // ---- What is ignored ----
 
 // Without the broker's filter the builder's own selection shows.
-TEST_F(SensorProviderFaultTest, healthStateBringsStatusAlong)
+TEST_F(SensorProviderFaultTest, HealthStateBringsStatusAlong)
 {
     const char* properties[] = {"HealthState", nullptr};
     const auto request = run(Operation::oneInstance,
@@ -245,7 +245,7 @@ TEST_F(SensorProviderFaultTest, healthStateBringsStatusAlong)
     EXPECT_EQ(request->answer.instances()[0]->properties().size(), 6U);
 }
 
-TEST_F(SensorProviderFaultTest, settingsThatFailAreIgnored)
+TEST_F(SensorProviderFaultTest, SettingsThatFailAreIgnored)
 {
     for (const BrokerCall call : {BrokerCall::setProperty, BrokerCall::setElementAt,
              BrokerCall::setHostname, BrokerCall::setNameSpace, BrokerCall::returnDone}) {
@@ -256,7 +256,7 @@ TEST_F(SensorProviderFaultTest, settingsThatFailAreIgnored)
 }
 
 // A broker may forget the namespace that a path was made with.
-TEST_F(SensorProviderFaultTest, everyNameIsGivenItsNamespaceOnceMoreBeforeItIsReturned)
+TEST_F(SensorProviderFaultTest, EveryNameIsGivenItsNamespaceOnceMoreBeforeItIsReturned)
 {
     run(Operation::names, {BrokerCall::setNameSpace, 4, FaultManner::errorStatus});
     EXPECT_EQ(faulty_->count(BrokerCall::setNameSpace), 4U); // two for each sensor
@@ -264,7 +264,7 @@ TEST_F(SensorProviderFaultTest, everyNameIsGivenItsNamespaceOnceMoreBeforeItIsRe
 
 // ---- Keys ----
 
-TEST_F(SensorProviderFaultTest, aKeyWithoutCharactersFindsNothing)
+TEST_F(SensorProviderFaultTest, AKeyWithoutCharactersFindsNothing)
 {
     const auto request = run(
         Operation::oneInstance, {BrokerCall::getCharPtr, 1, FaultManner::nullResult, CMPI_RC_OK});

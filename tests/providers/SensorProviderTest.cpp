@@ -45,7 +45,7 @@ protected:
 
 // ---- EnumInstanceNames ----
 
-TEST_F(SensorProviderTest, namesComeOrderedAndTheResultIsClosed)
+TEST_F(SensorProviderTest, NamesComeOrderedAndTheResultIsClosed)
 {
     expectOk(enumerateNames());
     EXPECT_THAT(deliveredIdentifiers(), ElementsAre("CPU:/p/a", "CPU:/p/b", "Fan:/p"));
@@ -53,7 +53,7 @@ TEST_F(SensorProviderTest, namesComeOrderedAndTheResultIsClosed)
     EXPECT_TRUE(messages_.empty());
 }
 
-TEST_F(SensorProviderTest, everyNameHasTheRequestsNamespace)
+TEST_F(SensorProviderTest, EveryNameHasTheRequestsNamespace)
 {
     expectOk(enumerateNames("root/other"));
     ASSERT_EQ(answer_.paths().size(), 3U);
@@ -61,7 +61,7 @@ TEST_F(SensorProviderTest, everyNameHasTheRequestsNamespace)
         EXPECT_EQ(each->nameSpace(), "root/other");
 }
 
-TEST_F(SensorlessProviderTest, namesAreAnOpenEmptyAnswer)
+TEST_F(SensorlessProviderTest, NamesAreAnOpenEmptyAnswer)
 {
     expectOk(enumerateNames());
     EXPECT_TRUE(answer_.paths().empty());
@@ -72,7 +72,7 @@ TEST_F(SensorlessProviderTest, namesAreAnOpenEmptyAnswer)
 
 // ---- EnumInstances ----
 
-TEST_F(SensorProviderTest, instancesComeOrderedAndTheResultIsClosed)
+TEST_F(SensorProviderTest, InstancesComeOrderedAndTheResultIsClosed)
 {
     expectOk(enumerate());
     EXPECT_THAT(deliveredIdentifiers(), ElementsAre("CPU:/p/a", "CPU:/p/b", "Fan:/p"));
@@ -80,7 +80,7 @@ TEST_F(SensorProviderTest, instancesComeOrderedAndTheResultIsClosed)
     EXPECT_EQ(answer_.instances()[0]->properties().size(), 22U); // all but the six thresholds
 }
 
-TEST_F(SensorProviderTest, instancesHaveTheListedPropertiesAndTheKeys)
+TEST_F(SensorProviderTest, InstancesHaveTheListedPropertiesAndTheKeys)
 {
     const char* properties[] = {"Name", nullptr};
     expectOk(enumerate(properties));
@@ -88,7 +88,7 @@ TEST_F(SensorProviderTest, instancesHaveTheListedPropertiesAndTheKeys)
     EXPECT_EQ(answer_.instances()[0]->properties().size(), 5U);
 }
 
-TEST_F(SensorlessProviderTest, instancesAreAClosedEmptyAnswer)
+TEST_F(SensorlessProviderTest, InstancesAreAClosedEmptyAnswer)
 {
     expectOk(enumerate());
     EXPECT_TRUE(answer_.instances().empty());
@@ -96,7 +96,7 @@ TEST_F(SensorlessProviderTest, instancesAreAClosedEmptyAnswer)
     EXPECT_TRUE(messages_.empty());
 }
 
-TEST_F(SensorProviderTest, everyRequestHarvestsAfresh)
+TEST_F(SensorProviderTest, EveryRequestHarvestsAfresh)
 {
     expectOk(enumerate());
     const ScriptedMachine changed({{NodeType::Voltage, "/v", "New", NodeReading{}}});
@@ -109,7 +109,7 @@ TEST_F(SensorProviderTest, everyRequestHarvestsAfresh)
 
 // ---- GetInstance ----
 
-TEST_F(SensorProviderTest, aDeviceIDAloneFindsItsInstance)
+TEST_F(SensorProviderTest, ADeviceIDAloneFindsItsInstance)
 {
     expectOk(get({{"DeviceID", "CPU:/p/b"}}));
     EXPECT_THAT(deliveredIdentifiers(), ElementsAre("CPU:/p/b"));
@@ -117,13 +117,13 @@ TEST_F(SensorProviderTest, aDeviceIDAloneFindsItsInstance)
     EXPECT_EQ(answer_.instances()[0]->properties().size(), 22U);
 }
 
-TEST_F(SensorProviderTest, theOtherKeysAreNotLookedAtBesideADeviceID)
+TEST_F(SensorProviderTest, TheOtherKeysAreNotLookedAtBesideADeviceID)
 {
     expectOk(get({{"SystemName", "elsewhere"}, {"DeviceID", "Fan:/p"}}));
     EXPECT_THAT(deliveredIdentifiers(), ElementsAre("Fan:/p"));
 }
 
-TEST_F(SensorProviderTest, anInstanceHasTheListedProperties)
+TEST_F(SensorProviderTest, AnInstanceHasTheListedProperties)
 {
     const char* properties[] = {"CurrentReading", nullptr};
     expectOk(get(path(Class, {{"DeviceID", "Fan:/p"}}), properties));
@@ -131,7 +131,7 @@ TEST_F(SensorProviderTest, anInstanceHasTheListedProperties)
     EXPECT_EQ(answer_.instances()[0]->properties().size(), 5U);
 }
 
-TEST_F(SensorProviderTest, aPathWithoutADeviceIDEqualsThatOfNoInstance)
+TEST_F(SensorProviderTest, APathWithoutADeviceIDEqualsThatOfNoInstance)
 {
     // The path of an instance has all four keys, so no path without a device identifier
     // equals one.

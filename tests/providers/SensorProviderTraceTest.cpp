@@ -68,7 +68,7 @@ const Lines EmptyFactory = builtFactory({});
 const Lines Paths = operation("getAllSensorCMPIObjPaths");
 const Lines OneInstance = operation("makeSensorInstance", 269, 737);
 
-TEST_F(SensorProviderTraceTest, ofEnumeratedNames)
+TEST_F(SensorProviderTraceTest, OfEnumeratedNames)
 {
     const HandlerLines lines = handlerOf("EnumInstanceNames");
     EXPECT_THAT(traceOf(OneFan, {}, enumerateNames),
@@ -76,7 +76,7 @@ TEST_F(SensorProviderTraceTest, ofEnumeratedNames)
             sequence({lines.entry(74), BuiltFactory, counted(), Paths, lines.exit(114)})));
 }
 
-TEST_F(SensorProviderTraceTest, ofEnumeratedNamesWithoutSensors)
+TEST_F(SensorProviderTraceTest, OfEnumeratedNamesWithoutSensors)
 {
     const HandlerLines lines = handlerOf("EnumInstanceNames");
     EXPECT_THAT(traceOf({}, {}, enumerateNames),
@@ -84,7 +84,7 @@ TEST_F(SensorProviderTraceTest, ofEnumeratedNamesWithoutSensors)
             lines.failure("getAllSensorCMPIObjPaths failed", 94), lines.exit(96)})));
 }
 
-TEST_F(SensorProviderTraceTest, ofEnumeratedInstances)
+TEST_F(SensorProviderTraceTest, OfEnumeratedInstances)
 {
     const HandlerLines lines = handlerOf("EnumInstances");
     EXPECT_THAT(traceOf(OneFan, {}, enumerate),
@@ -92,7 +92,7 @@ TEST_F(SensorProviderTraceTest, ofEnumeratedInstances)
             around(operation("getAllSensorCMPIInstances"), OneInstance), lines.exit(170)})));
 }
 
-TEST_F(SensorProviderTraceTest, ofAnInstanceFound)
+TEST_F(SensorProviderTraceTest, OfAnInstanceFound)
 {
     const HandlerLines lines = handlerOf("GetInstance");
     EXPECT_THAT(traceOf(OneFan, {{"DeviceID", "Fan:/f"}}, get),
@@ -100,7 +100,7 @@ TEST_F(SensorProviderTraceTest, ofAnInstanceFound)
             around(operation("getOneSensorCMPIInstance"), OneInstance), lines.exit(293)})));
 }
 
-TEST_F(SensorProviderTraceTest, ofAnInstanceNotFound)
+TEST_F(SensorProviderTraceTest, OfAnInstanceNotFound)
 {
     const HandlerLines lines = handlerOf("GetInstance");
     EXPECT_THAT(traceOf(OneFan, {{"DeviceID", "other"}}, get),
@@ -109,7 +109,7 @@ TEST_F(SensorProviderTraceTest, ofAnInstanceNotFound)
                 lines.failure("getOneSensorCMPIInstance failed", 220), lines.exit(222)})));
 }
 
-TEST_F(SensorProviderTraceTest, ofAnInstanceSearchedByItsPath)
+TEST_F(SensorProviderTraceTest, OfAnInstanceSearchedByItsPath)
 {
     const HandlerLines lines = handlerOf("GetInstance");
     EXPECT_THAT(traceOf(OneFan, {{"Other", "x"}}, get),
@@ -117,14 +117,14 @@ TEST_F(SensorProviderTraceTest, ofAnInstanceSearchedByItsPath)
             around(operation("getAllSensorCMPIInstances"), OneInstance), lines.exit(293)})));
 }
 
-TEST_F(SensorProviderTraceTest, ofARequestWithoutKeysHasNoFactory)
+TEST_F(SensorProviderTraceTest, OfARequestWithoutKeysHasNoFactory)
 {
     const HandlerLines lines = handlerOf("GetInstance");
     EXPECT_THAT(
         traceOf(OneFan, {}, get), ElementsAreArray(sequence({lines.entry(192), lines.exit(293)})));
 }
 
-TEST_F(SensorProviderTraceTest, bracketLinesStandInTheTraceHeader)
+TEST_F(SensorProviderTraceTest, BracketLinesStandInTheTraceHeader)
 {
     const ScriptedMachine machine;
     const CMPIObjectPath* const ref = path(Class).handle();
@@ -136,7 +136,7 @@ TEST_F(SensorProviderTraceTest, bracketLinesStandInTheTraceHeader)
     EXPECT_THAT(places, ElementsAre("Trace:336", "Trace:337", "Trace:348", "Trace:349"));
 }
 
-TEST_F(SensorProviderTraceTest, failuresStandInTheHandlersModule)
+TEST_F(SensorProviderTraceTest, FailuresStandInTheHandlersModule)
 {
     const ScriptedMachine machine;
     const CMPIObjectPath* const ref = path(Class).handle();

@@ -14,18 +14,18 @@ using namespace Testing::SystemDevice;
 
 // ---- Every call, every way ----
 
-class SystemDeviceFaultSweep : public SystemDeviceFaultTest,
-                               public ::testing::WithParamInterface<RequestKind> {};
+class SystemDeviceFaultSweepTest : public SystemDeviceFaultTest,
+                                   public ::testing::WithParamInterface<RequestKind> {};
 
-INSTANTIATE_TEST_SUITE_P(Instances, SystemDeviceFaultSweep,
+INSTANTIATE_TEST_SUITE_P(Instances, SystemDeviceFaultSweepTest,
     ::testing::Values(Names, Instances, OneInstance, Kinds.one("instanceWithoutKeys", Keyless)),
     ::testing::PrintToStringParamName());
-INSTANTIATE_TEST_SUITE_P(FromSensor, SystemDeviceFaultSweep, ::testing::ValuesIn(FromSensor),
+INSTANTIATE_TEST_SUITE_P(FromSensor, SystemDeviceFaultSweepTest, ::testing::ValuesIn(FromSensor),
     ::testing::PrintToStringParamName());
-INSTANTIATE_TEST_SUITE_P(FromSystem, SystemDeviceFaultSweep, ::testing::ValuesIn(FromSystem),
+INSTANTIATE_TEST_SUITE_P(FromSystem, SystemDeviceFaultSweepTest, ::testing::ValuesIn(FromSystem),
     ::testing::PrintToStringParamName());
 
-TEST_P(SystemDeviceFaultSweep, isSurvivedAndAnswersWithNothingMadeUp)
+TEST_P(SystemDeviceFaultSweepTest, IsSurvivedAndAnswersWithNothingMadeUp)
 {
     sweepFaults(broker_, [&](FaultyBroker& faulty) {
         const FaultyRequest request(broker_, faulty, GetParam());
@@ -40,7 +40,7 @@ class SystemDeviceAssociationFaultTest : public SystemDeviceFaultTest {};
 // ---- Associated objects. The first path that is made is the target, the second one of references
 // ---- is the association's. ----
 
-TEST_F(SystemDeviceAssociationFaultTest, aTargetThatCannotBeMadeIsNoTarget)
+TEST_F(SystemDeviceAssociationFaultTest, ATargetThatCannotBeMadeIsNoTarget)
 {
     for (const FaultManner manner : Undelivered)
         for (const auto* const kinds : {FromSensor, FromSystem})
@@ -61,7 +61,7 @@ TEST_F(SystemDeviceAssociationFaultTest, aTargetThatCannotBeMadeIsNoTarget)
 }
 
 // Whatever the broker said of the last text that was read on the way.
-TEST_F(SystemDeviceAssociationFaultTest, aResultClassThatIsNotServedIsAnsweredWithOk)
+TEST_F(SystemDeviceAssociationFaultTest, AResultClassThatIsNotServedIsAnsweredWithOk)
 {
     for (const SourceMaker& source : {Sensor, System}) {
         const RequestKind kind = {
@@ -83,7 +83,7 @@ TEST_F(SystemDeviceAssociationFaultTest, aResultClassThatIsNotServedIsAnsweredWi
     }
 }
 
-TEST_F(SystemDeviceAssociationFaultTest, sensorPathsThatCannotBeMadeEndInTheFactorysStatus)
+TEST_F(SystemDeviceAssociationFaultTest, SensorPathsThatCannotBeMadeEndInTheFactorysStatus)
 {
     for (const Which which : {AssociatorNames, References, ReferenceNames}) {
         const unsigned nth = which == AssociatorNames ? 2 : 3;
@@ -99,7 +99,7 @@ TEST_F(SystemDeviceAssociationFaultTest, sensorPathsThatCannotBeMadeEndInTheFact
     }
 }
 
-TEST_F(SystemDeviceAssociationFaultTest, withoutAnAssociationPathThereAreNoReferences)
+TEST_F(SystemDeviceAssociationFaultTest, WithoutAnAssociationPathThereAreNoReferences)
 {
     for (const auto* const kinds : {FromSensor, FromSystem})
         for (const Which which : {References, ReferenceNames}) {
@@ -112,7 +112,7 @@ TEST_F(SystemDeviceAssociationFaultTest, withoutAnAssociationPathThereAreNoRefer
         }
 }
 
-TEST_F(SystemDeviceAssociationFaultTest, anAssociatorThatCannotBeMadeIsPassedOnAsItIs)
+TEST_F(SystemDeviceAssociationFaultTest, AnAssociatorThatCannotBeMadeIsPassedOnAsItIs)
 {
     for (const FaultManner manner : Undelivered) {
         const auto request = run(FromSystem[Associators], {BrokerCall::newInstance, 1, manner});
@@ -122,14 +122,14 @@ TEST_F(SystemDeviceAssociationFaultTest, anAssociatorThatCannotBeMadeIsPassedOnA
 }
 
 // The status of the request is not handed over where an instance is asked for its path.
-TEST_F(SystemDeviceAssociationFaultTest, aPathThatIsNotToldLeavesTheStatus)
+TEST_F(SystemDeviceAssociationFaultTest, APathThatIsNotToldLeavesTheStatus)
 {
     const Fault fault = {BrokerCall::getObjectPath, 2, FaultManner::nullResult}; // the last
     for (const RequestKind& kind : {OneInstance, FromSystem[ReferenceNames]})
         EXPECT_EQ(run(kind, fault)->status.rc, CMPI_RC_OK) << kind;
 }
 
-TEST_F(SystemDeviceAssociationFaultTest, anAbsentEnumerationHasNoFarEnds)
+TEST_F(SystemDeviceAssociationFaultTest, AnAbsentEnumerationHasNoFarEnds)
 {
     for (const FaultManner manner : Undelivered)
         for (const Which which : {Associators, AssociatorNames, References, ReferenceNames}) {
@@ -141,7 +141,7 @@ TEST_F(SystemDeviceAssociationFaultTest, anAbsentEnumerationHasNoFarEnds)
         }
 }
 
-TEST_F(SystemDeviceAssociationFaultTest, associatorsBeforeABreakAreDeliveredWithItsStatus)
+TEST_F(SystemDeviceAssociationFaultTest, AssociatorsBeforeABreakAreDeliveredWithItsStatus)
 {
     for (const Which which : {Associators, AssociatorNames})
         for (const BrokerCall call : {BrokerCall::hasNext, BrokerCall::getNext}) {
@@ -151,7 +151,7 @@ TEST_F(SystemDeviceAssociationFaultTest, associatorsBeforeABreakAreDeliveredWith
         }
 }
 
-TEST_F(SystemDeviceAssociationFaultTest, aBreakBetweenFarEndsLeavesNoReferences)
+TEST_F(SystemDeviceAssociationFaultTest, ABreakBetweenFarEndsLeavesNoReferences)
 {
     for (const Which which : {References, ReferenceNames})
         for (const BrokerCall call : {BrokerCall::hasNext, BrokerCall::getNext}) {
@@ -166,7 +166,7 @@ TEST_F(SystemDeviceAssociationFaultTest, aBreakBetweenFarEndsLeavesNoReferences)
         }
 }
 
-TEST_F(SystemDeviceAssociationFaultTest, anElementWithoutHandleIsLeftOut)
+TEST_F(SystemDeviceAssociationFaultTest, AnElementWithoutHandleIsLeftOut)
 {
     for (const Which which : {Associators, AssociatorNames, References, ReferenceNames}) {
         const auto request =
@@ -176,7 +176,7 @@ TEST_F(SystemDeviceAssociationFaultTest, anElementWithoutHandleIsLeftOut)
     }
 }
 
-TEST_F(SystemDeviceAssociationFaultTest, aReferenceThatCannotBeMadeIsLeftOut)
+TEST_F(SystemDeviceAssociationFaultTest, AReferenceThatCannotBeMadeIsLeftOut)
 {
     for (const FaultManner manner : Undelivered)
         for (const auto* const kinds : {FromSensor, FromSystem})

@@ -68,7 +68,7 @@ protected:
 
 // ---- Associators ----
 
-TEST_F(SystemDeviceAssociationTest, aSensorIsAssociatedWithEverySystem)
+TEST_F(SystemDeviceAssociationTest, ASensorIsAssociatedWithEverySystem)
 {
     systems_.nameSpace = "root/elsewhere";
     const char* properties[] = {"Name", nullptr};
@@ -87,7 +87,7 @@ TEST_F(SystemDeviceAssociationTest, aSensorIsAssociatedWithEverySystem)
     EXPECT_FALSE(systems_.calls[0].hasPropertyList);
 }
 
-TEST_F(SystemDeviceAssociationTest, aSystemIsAssociatedWithEverySensor)
+TEST_F(SystemDeviceAssociationTest, ASystemIsAssociatedWithEverySensor)
 {
     const char* properties[] = {"Name", nullptr};
     expectOk(associators(system("any", "root/other"), {.associationClass = Class}));
@@ -104,7 +104,7 @@ TEST_F(SystemDeviceAssociationTest, aSystemIsAssociatedWithEverySensor)
 
 // ---- AssociatorNames ----
 
-TEST_F(SystemDeviceAssociationTest, namesOfASensorsAssociatorsAreTheSystemsAsTheyCame)
+TEST_F(SystemDeviceAssociationTest, NamesOfASensorsAssociatorsAreTheSystemsAsTheyCame)
 {
     systems_.nameSpace = "root/elsewhere";
     expectOk(associatorNames(sensor("B:/2"), {.associationClass = Class}));
@@ -118,7 +118,7 @@ TEST_F(SystemDeviceAssociationTest, namesOfASensorsAssociatorsAreTheSystemsAsThe
     EXPECT_EQ(systems_.calls[0].context, context());
 }
 
-TEST_F(SystemDeviceAssociationTest, namesOfASystemsAssociatorsAreTheSensors)
+TEST_F(SystemDeviceAssociationTest, NamesOfASystemsAssociatorsAreTheSensors)
 {
     expectOk(associatorNames(system("any", "root/other")));
     ASSERT_EQ(answer_.paths().size(), 3U);
@@ -127,14 +127,14 @@ TEST_F(SystemDeviceAssociationTest, namesOfASystemsAssociatorsAreTheSensors)
     EXPECT_FALSE(answer_.isDone());
 }
 
-TEST_F(SystemDeviceWithoutSensorsTest, aSystemsAssociatorsAreAnOpenEmptyAnswer)
+TEST_F(SystemDeviceWithoutSensorsTest, ASystemsAssociatorsAreAnOpenEmptyAnswer)
 {
     expectOk(associators(system("host")));
     expectOk(associatorNames(system("host")));
     expectNothing(false);
 }
 
-TEST_F(SystemDeviceWithoutSystemsTest, aSensorsAssociatorsAreAnOpenEmptyAnswer)
+TEST_F(SystemDeviceWithoutSystemsTest, ASensorsAssociatorsAreAnOpenEmptyAnswer)
 {
     expectOk(associators(sensor("A:/1")));
     expectOk(associatorNames(sensor("A:/1")));
@@ -143,7 +143,7 @@ TEST_F(SystemDeviceWithoutSystemsTest, aSensorsAssociatorsAreAnOpenEmptyAnswer)
 
 // ---- The result class ----
 
-TEST_F(SystemDeviceAssociationTest, theResultClassIsThatOfSystemsOrTheStandardOne)
+TEST_F(SystemDeviceAssociationTest, TheResultClassIsThatOfSystemsOrTheStandardOne)
 {
     for (const char* const wanted :
         {static_cast<const char*>(nullptr), "ZUMLO_ComputerSystem", "CIM_ComputerSystem",
@@ -156,7 +156,7 @@ TEST_F(SystemDeviceAssociationTest, theResultClassIsThatOfSystemsOrTheStandardOn
     EXPECT_TRUE(systems_.calls.empty());
 }
 
-TEST_F(SystemDeviceAssociationTest, theResultClassIsThatOfSensorsOrTheStandardOne)
+TEST_F(SystemDeviceAssociationTest, TheResultClassIsThatOfSensorsOrTheStandardOne)
 {
     for (const char* const wanted : {static_cast<const char*>(nullptr), "ZUMLO_NumericSensor",
              "CIM_NumericSensor", "zumlo_numericsensor", "cim_numericsensor", "CIM_NUMERICSENSOR"})
@@ -168,7 +168,7 @@ TEST_F(SystemDeviceAssociationTest, theResultClassIsThatOfSensorsOrTheStandardOn
 
 // ---- The source and the association class ----
 
-TEST_F(SystemDeviceAssociationTest, keysOfOtherTypesDoNotMatter)
+TEST_F(SystemDeviceAssociationTest, KeysOfOtherTypesDoNotMatter)
 {
     Host::ObjectPath& part = path(SensorClass);
     part.addKey("DeviceID", Host::Value::integer(CMPI_uint64, 7));
@@ -184,7 +184,7 @@ TEST_F(SystemDeviceAssociationTest, keysOfOtherTypesDoNotMatter)
     EXPECT_EQ(answer_.paths().size(), 3U);
 }
 
-TEST_F(SystemDeviceAssociationTest, withoutATargetTheAnswerIsEmptyOpenAndOk)
+TEST_F(SystemDeviceAssociationTest, WithoutATargetTheAnswerIsEmptyOpenAndOk)
 {
     for (const char* const other : {"zumlo_sensorsystemdevice", "CIM_SystemDevice", ""}) {
         expectOk(associators(sensor("A:/1"), {.associationClass = other}));
@@ -199,7 +199,7 @@ TEST_F(SystemDeviceAssociationTest, withoutATargetTheAnswerIsEmptyOpenAndOk)
     EXPECT_TRUE(systems_.calls.empty());
 }
 
-TEST_F(SystemDeviceAssociationTest, theOtherAssociationOfASensorLeadsNowhere)
+TEST_F(SystemDeviceAssociationTest, TheOtherAssociationOfASensorLeadsNowhere)
 {
     const Filter other = {.associationClass = "ZUMLO_SensorElementCapabilities"};
     expectOk(associators(sensor("A:/1"), other));
@@ -208,7 +208,7 @@ TEST_F(SystemDeviceAssociationTest, theOtherAssociationOfASensorLeadsNowhere)
     EXPECT_TRUE(systems_.calls.empty());
 }
 
-TEST_F(SystemDeviceAssociationTest, theOtherAssociationOfCapabilitiesLeadsToTheSensors)
+TEST_F(SystemDeviceAssociationTest, TheOtherAssociationOfCapabilitiesLeadsToTheSensors)
 {
     expectOk(
         associatorNames(capabilities(), {.associationClass = "ZUMLO_SensorElementCapabilities"}));
@@ -217,7 +217,7 @@ TEST_F(SystemDeviceAssociationTest, theOtherAssociationOfCapabilitiesLeadsToTheS
 
 // ---- References ----
 
-TEST_F(SystemDeviceAssociationTest, referencesOfASystemPairItWithEverySensor)
+TEST_F(SystemDeviceAssociationTest, ReferencesOfASystemPairItWithEverySensor)
 {
     const Host::ObjectPath& source = system("as it came", "root/other");
     const char* properties[] = {"Nothing", nullptr};
@@ -237,7 +237,7 @@ TEST_F(SystemDeviceAssociationTest, referencesOfASystemPairItWithEverySensor)
     EXPECT_TRUE(systems_.calls.empty());
 }
 
-TEST_F(SystemDeviceAssociationTest, referencesOfASensorPairItWithEverySystem)
+TEST_F(SystemDeviceAssociationTest, ReferencesOfASensorPairItWithEverySystem)
 {
     systems_.nameSpace = "root/elsewhere";
     const Host::ObjectPath& source = sensor("D:/4", "root/other");
@@ -255,7 +255,7 @@ TEST_F(SystemDeviceAssociationTest, referencesOfASensorPairItWithEverySystem)
     EXPECT_EQ(systems_.calls[0].context, context());
 }
 
-TEST_F(SystemDeviceAssociationTest, namesOfReferencesAreThePathsOfTheSamePairs)
+TEST_F(SystemDeviceAssociationTest, NamesOfReferencesAreThePathsOfTheSamePairs)
 {
     expectOk(referenceNames(system("host", "root/other"), {.resultClass = "NOT_AClass"}));
     expectOk(referenceNames(sensor("A:/1", "root/other"), {.role = "Nobody"}));
@@ -265,21 +265,21 @@ TEST_F(SystemDeviceAssociationTest, namesOfReferencesAreThePathsOfTheSamePairs)
     EXPECT_FALSE(answer_.isDone());
 }
 
-TEST_F(SystemDeviceWithoutSensorsTest, referencesOfASystemAreAnOpenEmptyAnswer)
+TEST_F(SystemDeviceWithoutSensorsTest, ReferencesOfASystemAreAnOpenEmptyAnswer)
 {
     expectOk(references(system("host")));
     expectOk(referenceNames(system("host")));
     expectNothing(false);
 }
 
-TEST_F(SystemDeviceWithoutSystemsTest, referencesOfASensorAreAnOpenEmptyAnswer)
+TEST_F(SystemDeviceWithoutSystemsTest, ReferencesOfASensorAreAnOpenEmptyAnswer)
 {
     expectOk(references(sensor("A:/1")));
     expectOk(referenceNames(sensor("A:/1")));
     expectNothing(false);
 }
 
-TEST_F(SystemDeviceAssociationTest, referencesOfAnotherSourceHaveNoTarget)
+TEST_F(SystemDeviceAssociationTest, ReferencesOfAnotherSourceHaveNoTarget)
 {
     for (Host::ObjectPath* const source :
         {&capabilities(), &path("zumlo_computersystem"), &path(Class)}) {
@@ -295,7 +295,7 @@ TEST_F(SystemDeviceAssociationTest, referencesOfAnotherSourceHaveNoTarget)
 
 // ---- Up-calls that fail or answer strangely ----
 
-TEST_F(SystemDeviceAssociationTest, aRefusedUpcallIsTheAnswer)
+TEST_F(SystemDeviceAssociationTest, ARefusedUpcallIsTheAnswer)
 {
     systems_.refusal = CMPI_RC_ERR_ACCESS_DENIED;
     const Host::ObjectPath& source = sensor("A:/1");
@@ -307,7 +307,7 @@ TEST_F(SystemDeviceAssociationTest, aRefusedUpcallIsTheAnswer)
     expectNothing(false);
 }
 
-TEST_F(SystemDeviceAssociationTest, elementsOfAnotherTypeAreLeftOut)
+TEST_F(SystemDeviceAssociationTest, ElementsOfAnotherTypeAreLeftOut)
 {
     systems_.isMixed = true;
     expectOk(associators(sensor("A:/1")));
@@ -318,7 +318,7 @@ TEST_F(SystemDeviceAssociationTest, elementsOfAnotherTypeAreLeftOut)
     EXPECT_EQ(answer_.refused(), 0U);
 }
 
-TEST_F(SystemDeviceAssociationTest, elementsOfAnotherTypeAreLeftOutOfNames)
+TEST_F(SystemDeviceAssociationTest, ElementsOfAnotherTypeAreLeftOutOfNames)
 {
     systems_.isMixed = true;
     expectOk(associatorNames(sensor("A:/1")));

@@ -56,7 +56,7 @@ constexpr unsigned FirstAssociation = 4;
 constexpr unsigned LastAssociation = 9;
 constexpr unsigned LastKeyOfFirstSensor = 4;
 
-TEST_F(SystemDeviceInstanceFaultTest, namesEndAtASystemPathThatCannotBeMade)
+TEST_F(SystemDeviceInstanceFaultTest, NamesEndAtASystemPathThatCannotBeMade)
 {
     for (const FaultManner manner : Undelivered)
         for (const BrokerCall call : {BrokerCall::newObjectPath, BrokerCall::getNameSpace})
@@ -65,13 +65,13 @@ TEST_F(SystemDeviceInstanceFaultTest, namesEndAtASystemPathThatCannotBeMade)
     EXPECT_THAT(systems_.calls, IsEmpty());
 }
 
-TEST_F(SystemDeviceInstanceFaultTest, namesEndAtASensorPathThatIsGone)
+TEST_F(SystemDeviceInstanceFaultTest, NamesEndAtASensorPathThatIsGone)
 {
     expectNamesFailure({BrokerCall::addKey, LastKeyOfFirstSensor, FaultManner::lostHandle},
         "CMPIObjectPath is NULL for Sensor", "CMPIObjectPath is NULL for Sensor Class", false);
 }
 
-TEST_F(SystemDeviceInstanceFaultTest, namesEndAtAnAssociationPathThatCannotBeMade)
+TEST_F(SystemDeviceInstanceFaultTest, NamesEndAtAnAssociationPathThatCannotBeMade)
 {
     for (const FaultManner manner : Undelivered)
         for (const unsigned nth : {FirstAssociation, LastAssociation}) {
@@ -82,7 +82,7 @@ TEST_F(SystemDeviceInstanceFaultTest, namesEndAtAnAssociationPathThatCannotBeMad
         }
 }
 
-TEST_F(SystemDeviceInstanceFaultTest, namesWithoutSensorPathsEndInTheFactorysStatus)
+TEST_F(SystemDeviceInstanceFaultTest, NamesWithoutSensorPathsEndInTheFactorysStatus)
 {
     for (const FaultManner manner : Undelivered) {
         const auto [request, lines] =
@@ -93,7 +93,7 @@ TEST_F(SystemDeviceInstanceFaultTest, namesWithoutSensorPathsEndInTheFactorysSta
     }
 }
 
-TEST_F(SystemDeviceInstanceFaultTest, namesAnswerAFailedUpcallWithOkAndAMessage)
+TEST_F(SystemDeviceInstanceFaultTest, NamesAnswerAFailedUpcallWithOkAndAMessage)
 {
     for (const FaultManner manner :
         {FaultManner::nullResult, FaultManner::handleless, FaultManner::errorStatus}) {
@@ -106,7 +106,7 @@ TEST_F(SystemDeviceInstanceFaultTest, namesAnswerAFailedUpcallWithOkAndAMessage)
     }
 }
 
-TEST_F(SystemDeviceInstanceFaultTest, anAbsentEnumerationHasNoSystems)
+TEST_F(SystemDeviceInstanceFaultTest, AnAbsentEnumerationHasNoSystems)
 {
     for (const FaultManner manner : Undelivered)
         for (const RequestKind& kind : {Names, Instances, OneInstance}) {
@@ -119,7 +119,7 @@ TEST_F(SystemDeviceInstanceFaultTest, anAbsentEnumerationHasNoSystems)
         }
 }
 
-TEST_F(SystemDeviceInstanceFaultTest, namesEndWhereTheEnumerationBreaks)
+TEST_F(SystemDeviceInstanceFaultTest, NamesEndWhereTheEnumerationBreaks)
 {
     for (const BrokerCall call : {BrokerCall::hasNext, BrokerCall::getNext})
         for (const FaultManner manner : {FaultManner::nullResult, FaultManner::errorStatus}) {
@@ -132,7 +132,7 @@ TEST_F(SystemDeviceInstanceFaultTest, namesEndWhereTheEnumerationBreaks)
         }
 }
 
-TEST_F(SystemDeviceInstanceFaultTest, theBuilderReportsASystemPathThatCannotBeMade)
+TEST_F(SystemDeviceInstanceFaultTest, TheBuilderReportsASystemPathThatCannotBeMade)
 {
     for (const FaultManner manner : Undelivered)
         expectBuilderFailure({BrokerCall::newObjectPath, SystemPath, manner},
@@ -141,14 +141,14 @@ TEST_F(SystemDeviceInstanceFaultTest, theBuilderReportsASystemPathThatCannotBeMa
             true);
 }
 
-TEST_F(SystemDeviceInstanceFaultTest, theBuilderReportsASensorPathThatIsGone)
+TEST_F(SystemDeviceInstanceFaultTest, TheBuilderReportsASensorPathThatIsGone)
 {
     const std::string text = "CMPIObjectPath is NULL for Sensor Provider";
     expectBuilderFailure(
         {BrokerCall::addKey, LastKeyOfFirstSensor, FaultManner::lostHandle}, text, text, false);
 }
 
-TEST_F(SystemDeviceInstanceFaultTest, theBuilderReportsAnAssociationPathThatCannotBeMade)
+TEST_F(SystemDeviceInstanceFaultTest, TheBuilderReportsAnAssociationPathThatCannotBeMade)
 {
     for (const FaultManner manner : Undelivered)
         for (const unsigned nth : {FirstAssociation, LastAssociation})
@@ -157,7 +157,7 @@ TEST_F(SystemDeviceInstanceFaultTest, theBuilderReportsAnAssociationPathThatCann
                 "Create CMPIObjectPath failed for" + Gap + "HostedAccessPoint.", false);
 }
 
-TEST_F(SystemDeviceInstanceFaultTest, theBuilderEndsSilentlyAtAnUpcallAnElementOrSensorsThatFail)
+TEST_F(SystemDeviceInstanceFaultTest, TheBuilderEndsSilentlyAtAnUpcallAnElementOrSensorsThatFail)
 {
     for (const Fault& fault :
         {Fault{BrokerCall::enumerateInstanceNames, 1, FaultManner::nullResult},
@@ -175,7 +175,7 @@ TEST_F(SystemDeviceInstanceFaultTest, theBuilderEndsSilentlyAtAnUpcallAnElementO
     }
 }
 
-TEST_F(SystemDeviceInstanceFaultTest, anInstanceThatCannotBeMadeIsPassedOnButPassedOverInASearch)
+TEST_F(SystemDeviceInstanceFaultTest, AnInstanceThatCannotBeMadeIsPassedOnButPassedOverInASearch)
 {
     for (const FaultManner manner : Undelivered) {
         const auto all = run(Instances, {BrokerCall::newInstance, 1, manner});

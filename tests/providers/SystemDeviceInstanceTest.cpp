@@ -58,7 +58,7 @@ const std::vector<std::string> AllPairs = {
 
 // ---- EnumInstanceNames ----
 
-TEST_F(SystemDeviceInstanceTest, namesArePairsSystemBySystem)
+TEST_F(SystemDeviceInstanceTest, NamesArePairsSystemBySystem)
 {
     expectOk(enumerateNames(path(Class)));
     EXPECT_EQ(pairs(), AllPairs);
@@ -67,7 +67,7 @@ TEST_F(SystemDeviceInstanceTest, namesArePairsSystemBySystem)
     expectUpcall("root/cimv2:ZUMLO_ComputerSystem");
 }
 
-TEST_F(SystemDeviceInstanceTest, aNameIsAPathInTheRequestsNamespaceOnThisSystem)
+TEST_F(SystemDeviceInstanceTest, ANameIsAPathInTheRequestsNamespaceOnThisSystem)
 {
     systems_.nameSpace = "root/elsewhere";
     expectOk(enumerateNames(path(Class, {}, "root/other")));
@@ -82,26 +82,26 @@ TEST_F(SystemDeviceInstanceTest, aNameIsAPathInTheRequestsNamespaceOnThisSystem)
             "PartComponent = ref " + sensor("B:/2", "root/other").toText()));
 }
 
-TEST_F(SystemDeviceOfOnePairTest, hasOneName)
+TEST_F(SystemDeviceOfOnePairTest, HasOneName)
 {
     expectOk(enumerateNames(path(Class)));
     EXPECT_THAT(pairs(), ElementsAre("host C:/3"));
 }
 
-TEST_F(SystemDeviceOfNoSystemTest, namesAreAClosedEmptyAnswer)
+TEST_F(SystemDeviceOfNoSystemTest, NamesAreAClosedEmptyAnswer)
 {
     expectOk(enumerateNames(path(Class)));
     expectNothing(true);
     EXPECT_THAT(messages_, IsEmpty());
 }
 
-TEST_F(SystemDeviceOfNoSensorTest, namesAreAClosedEmptyAnswer)
+TEST_F(SystemDeviceOfNoSensorTest, NamesAreAClosedEmptyAnswer)
 {
     expectOk(enumerateNames(path(Class)));
     expectNothing(true);
 }
 
-TEST_F(SystemDeviceInstanceTest, systemsThatNobodyServesAreAnOpenEmptyAnswerThatSaysSo)
+TEST_F(SystemDeviceInstanceTest, SystemsThatNobodyServesAreAnOpenEmptyAnswerThatSaysSo)
 {
     for (const CMPIrc refusal : {CMPI_RC_ERR_NOT_SUPPORTED, CMPI_RC_ERR_FAILED}) {
         systems_.refusal = refusal;
@@ -113,7 +113,7 @@ TEST_F(SystemDeviceInstanceTest, systemsThatNobodyServesAreAnOpenEmptyAnswerThat
     }
 }
 
-TEST_F(SystemDeviceInstanceTest, withoutABrokerNamesFailWithoutAMessage)
+TEST_F(SystemDeviceInstanceTest, WithoutABrokerNamesFailWithoutAMessage)
 {
     SensorSystemDeviceProvider_Create_AssociationMI(nullptr, nullptr, nullptr);
     const CMPIStatus status = enumerateNames(path(Class));
@@ -123,7 +123,7 @@ TEST_F(SystemDeviceInstanceTest, withoutABrokerNamesFailWithoutAMessage)
     EXPECT_TRUE(systems_.calls.empty());
 }
 
-TEST_F(SystemDeviceInstanceTest, elementsThatAreNoPathsArePassedOverInNames)
+TEST_F(SystemDeviceInstanceTest, ElementsThatAreNoPathsArePassedOverInNames)
 {
     systems_.isMixed = true;
     expectOk(enumerateNames(path(Class)));
@@ -133,7 +133,7 @@ TEST_F(SystemDeviceInstanceTest, elementsThatAreNoPathsArePassedOverInNames)
 
 // ---- EnumInstances ----
 
-TEST_F(SystemDeviceInstanceTest, instancesArePairsSystemBySystem)
+TEST_F(SystemDeviceInstanceTest, InstancesArePairsSystemBySystem)
 {
     systems_.nameSpace = "root/elsewhere";
     expectOk(enumerate(path(Class, {}, "root/other")));
@@ -150,7 +150,7 @@ TEST_F(SystemDeviceInstanceTest, instancesArePairsSystemBySystem)
             "PartComponent = ref " + sensor("C:/3", "root/other").toText()));
 }
 
-TEST_F(SystemDeviceInstanceTest, theFilterKeepsBothReferencesWhateverTheListNames)
+TEST_F(SystemDeviceInstanceTest, TheFilterKeepsBothReferencesWhateverTheListNames)
 {
     broker_.setClassInformation(nullptr); // so that the filter's own keys are known alone
     const char* properties[] = {"Nothing", nullptr};
@@ -161,19 +161,19 @@ TEST_F(SystemDeviceInstanceTest, theFilterKeepsBothReferencesWhateverTheListName
             namesOf(instance->properties()), ElementsAre("GroupComponent", "PartComponent"));
 }
 
-TEST_F(SystemDeviceOfNoSystemTest, instancesAreAClosedEmptyAnswer)
+TEST_F(SystemDeviceOfNoSystemTest, InstancesAreAClosedEmptyAnswer)
 {
     expectOk(enumerate(path(Class)));
     expectNothing(true);
 }
 
-TEST_F(SystemDeviceOfNoSensorTest, instancesAreAClosedEmptyAnswer)
+TEST_F(SystemDeviceOfNoSensorTest, InstancesAreAClosedEmptyAnswer)
 {
     expectOk(enumerate(path(Class)));
     expectNothing(true);
 }
 
-TEST_F(SystemDeviceInstanceTest, systemsThatNobodyServesHaveNoInstancesInAClosedResult)
+TEST_F(SystemDeviceInstanceTest, SystemsThatNobodyServesHaveNoInstancesInAClosedResult)
 {
     systems_.refusal = CMPI_RC_ERR_NOT_SUPPORTED;
     expectOk(enumerate(path(Class)));
@@ -181,14 +181,14 @@ TEST_F(SystemDeviceInstanceTest, systemsThatNobodyServesHaveNoInstancesInAClosed
     EXPECT_THAT(messages_, IsEmpty());
 }
 
-TEST_F(SystemDeviceInstanceTest, elementsThatAreNoPathsArePassedOverInInstances)
+TEST_F(SystemDeviceInstanceTest, ElementsThatAreNoPathsArePassedOverInInstances)
 {
     systems_.isMixed = true;
     expectOk(enumerate(path(Class)));
     EXPECT_EQ(pairs(), AllPairs);
 }
 
-TEST_F(SystemDeviceInstanceTest, theBuilderKeepsWhatIsThereAndSaysWhetherItFailed)
+TEST_F(SystemDeviceInstanceTest, TheBuilderKeepsWhatIsThereAndSaysWhetherItFailed)
 {
     using Vorn::SensorProfileProvider::sensorSystemDeviceCMPIInstances;
     std::vector<CMPIInstance*> instances = {nullptr};
@@ -208,7 +208,7 @@ TEST_F(SystemDeviceInstanceTest, theBuilderKeepsWhatIsThereAndSaysWhetherItFaile
 
 // ---- GetInstance ----
 
-TEST_F(SystemDeviceInstanceTest, anInstanceIsFoundByItsReferences)
+TEST_F(SystemDeviceInstanceTest, AnInstanceIsFoundByItsReferences)
 {
     expectOk(get(pairPath(system("guest"), sensor("B:/2"))));
     EXPECT_THAT(pairs(), ElementsAre("guest B:/2"));
@@ -216,13 +216,13 @@ TEST_F(SystemDeviceInstanceTest, anInstanceIsFoundByItsReferences)
     expectUpcall("root/cimv2:ZUMLO_ComputerSystem");
 }
 
-TEST_F(SystemDeviceInstanceTest, theFirstOfEqualInstancesIsReturnedAlone)
+TEST_F(SystemDeviceInstanceTest, TheFirstOfEqualInstancesIsReturnedAlone)
 {
     systems_.names = {"host", "host"};
     EXPECT_THAT(got(pairPath(system("host"), sensor("A:/1"))), ElementsAre("host A:/1"));
 }
 
-TEST_F(SystemDeviceInstanceTest, neitherOrderNorLetterCaseNorHostsMatter)
+TEST_F(SystemDeviceInstanceTest, NeitherOrderNorLetterCaseNorHostsMatter)
 {
     Host::ObjectPath& group = path("zumlo_computersystem",
         {{"name", "guest"}, {"creationclassname", SystemClass}}, "ROOT/CIMV2");
@@ -237,7 +237,7 @@ TEST_F(SystemDeviceInstanceTest, neitherOrderNorLetterCaseNorHostsMatter)
     EXPECT_THAT(got(ref), ElementsAre("guest C:/3"));
 }
 
-TEST_F(SystemDeviceInstanceTest, otherValuesAreAClosedEmptyAnswer)
+TEST_F(SystemDeviceInstanceTest, OtherValuesAreAClosedEmptyAnswer)
 {
     EXPECT_THAT(got(pairPath(system("other"), sensor("A:/1"))), IsEmpty());
     EXPECT_THAT(got(pairPath(system("Guest"), sensor("A:/1"))), IsEmpty());
@@ -247,7 +247,7 @@ TEST_F(SystemDeviceInstanceTest, otherValuesAreAClosedEmptyAnswer)
     EXPECT_THAT(got(path(Class, {{"Other", "x"}})), IsEmpty());
 }
 
-TEST_F(SystemDeviceInstanceTest, aReferenceOfAnotherTypeFindsNothing)
+TEST_F(SystemDeviceInstanceTest, AReferenceOfAnotherTypeFindsNothing)
 {
     Host::Arena& arena = request_->arena();
     for (const Host::Value& value : {Host::Value::text(arena, system("host").toText()),
@@ -263,7 +263,7 @@ TEST_F(SystemDeviceInstanceTest, aReferenceOfAnotherTypeFindsNothing)
     EXPECT_THAT(got(pairPath(system("host"), part)), IsEmpty());
 }
 
-TEST_F(SystemDeviceInstanceTest, aPathWithoutKeysIsRefusedInAClosedResult)
+TEST_F(SystemDeviceInstanceTest, APathWithoutKeysIsRefusedInAClosedResult)
 {
     expectFailure(get(path(Class)), NoKeyText);
     expectNothing(true);
@@ -271,7 +271,7 @@ TEST_F(SystemDeviceInstanceTest, aPathWithoutKeysIsRefusedInAClosedResult)
     EXPECT_TRUE(systems_.calls.empty());
 }
 
-TEST_F(SystemDeviceInstanceTest, aFailedUpcallFindsNothingAndIsOk)
+TEST_F(SystemDeviceInstanceTest, AFailedUpcallFindsNothingAndIsOk)
 {
     systems_.refusal = CMPI_RC_ERR_FAILED;
     EXPECT_THAT(got(pairPath(system("host"), sensor("A:/1"))), IsEmpty());

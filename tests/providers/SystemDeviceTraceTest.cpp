@@ -49,7 +49,7 @@ protected:
 
 const Lines Fetched = sequence({counted(), SensorPaths});
 
-TEST_F(SystemDeviceTraceTest, ofEnumeratedNames)
+TEST_F(SystemDeviceTraceTest, OfEnumeratedNames)
 {
     const Host::ObjectPath& ref = path(Class);
     const HandlerLines lines = request("EnumInstanceNames");
@@ -57,7 +57,7 @@ TEST_F(SystemDeviceTraceTest, ofEnumeratedNames)
         ElementsAreArray(sequence({lines.entry(), Built, Fetched, Fetched, lines.exit()})));
 }
 
-TEST_F(SystemDeviceEmptyTraceTest, ofNamesWithoutSensors)
+TEST_F(SystemDeviceEmptyTraceTest, OfNamesWithoutSensors)
 {
     const Host::ObjectPath& ref = path(Class);
     const HandlerLines lines = request("EnumInstanceNames");
@@ -65,7 +65,7 @@ TEST_F(SystemDeviceEmptyTraceTest, ofNamesWithoutSensors)
         ElementsAreArray(sequence({lines.entry(), BuiltWithoutSensors, Fetched, lines.exit()})));
 }
 
-TEST_F(SystemDeviceTraceTest, ofNamesWithoutAnybodyToServeSystemsHasNoExitMark)
+TEST_F(SystemDeviceTraceTest, OfNamesWithoutAnybodyToServeSystemsHasNoExitMark)
 {
     systems_.refusal = CMPI_RC_ERR_NOT_SUPPORTED;
     const Host::ObjectPath& ref = path(Class);
@@ -73,7 +73,7 @@ TEST_F(SystemDeviceTraceTest, ofNamesWithoutAnybodyToServeSystemsHasNoExitMark)
         ElementsAreArray(sequence({request("EnumInstanceNames").entry(), Built})));
 }
 
-TEST_F(SystemDeviceTraceTest, ofEnumeratedInstances)
+TEST_F(SystemDeviceTraceTest, OfEnumeratedInstances)
 {
     const Host::ObjectPath& ref = path(Class);
     const HandlerLines lines = request("EnumInstances");
@@ -83,7 +83,7 @@ TEST_F(SystemDeviceTraceTest, ofEnumeratedInstances)
 }
 
 // A builder that breaks off leaves its exit mark out.
-TEST_F(SystemDeviceTraceTest, ofInstancesWithoutAnybodyToServeSystems)
+TEST_F(SystemDeviceTraceTest, OfInstancesWithoutAnybodyToServeSystems)
 {
     systems_.refusal = CMPI_RC_ERR_NOT_SUPPORTED;
     const Host::ObjectPath& ref = path(Class);
@@ -93,7 +93,7 @@ TEST_F(SystemDeviceTraceTest, ofInstancesWithoutAnybodyToServeSystems)
             sequence({lines.entry(), Builder.entry(), Built, counted(), lines.exit()})));
 }
 
-TEST_F(SystemDeviceEmptyTraceTest, ofInstancesWithoutSensors)
+TEST_F(SystemDeviceEmptyTraceTest, OfInstancesWithoutSensors)
 {
     const Host::ObjectPath& ref = path(Class);
     const HandlerLines lines = request("EnumInstances");
@@ -102,7 +102,7 @@ TEST_F(SystemDeviceEmptyTraceTest, ofInstancesWithoutSensors)
             Fetched, lines.exit()})));
 }
 
-TEST_F(SystemDeviceTraceTest, ofAnInstanceSearched)
+TEST_F(SystemDeviceTraceTest, OfAnInstanceSearched)
 {
     const Host::ObjectPath& ref = path(Class, {{"Other", "x"}});
     const HandlerLines lines = request("GetInstance");
@@ -111,7 +111,7 @@ TEST_F(SystemDeviceTraceTest, ofAnInstanceSearched)
             Fetched, Builder.exit(), lines.exit()})));
 }
 
-TEST_F(SystemDeviceTraceTest, ofARequestWithoutKeysHasNoFactory)
+TEST_F(SystemDeviceTraceTest, OfARequestWithoutKeysHasNoFactory)
 {
     const Host::ObjectPath& ref = path(Class);
     const HandlerLines lines = request("GetInstance");
@@ -122,7 +122,7 @@ TEST_F(SystemDeviceTraceTest, ofARequestWithoutKeysHasNoFactory)
 
 // ---- Associated objects ----
 
-TEST_F(SystemDeviceTraceTest, ofTheAssociatorsOfASensor)
+TEST_F(SystemDeviceTraceTest, OfTheAssociatorsOfASensor)
 {
     const Host::ObjectPath& source = sensor("B:/2");
     const HandlerLines instances = request("Associators");
@@ -135,7 +135,7 @@ TEST_F(SystemDeviceTraceTest, ofTheAssociatorsOfASensor)
             sequence({names.entry(), Built, lookedUp(Class, "(null)", 1221), names.exit()})));
 }
 
-TEST_F(SystemDeviceTraceTest, ofTheAssociatorsOfASystem)
+TEST_F(SystemDeviceTraceTest, OfTheAssociatorsOfASystem)
 {
     const Host::ObjectPath& source = system("host");
     const HandlerLines instances = request("Associators");
@@ -151,7 +151,7 @@ TEST_F(SystemDeviceTraceTest, ofTheAssociatorsOfASystem)
             {names.entry(), Built, lookedUp(Class, "(null)", 1205), Fetched, names.exit()})));
 }
 
-TEST_F(SystemDeviceTraceTest, ofAResultClassThatIsNotServedHasNoExitMark)
+TEST_F(SystemDeviceTraceTest, OfAResultClassThatIsNotServedHasNoExitMark)
 {
     const Host::ObjectPath& fromSensor = sensor("B:/2");
     const Host::ObjectPath& fromSystem = system("host");
@@ -163,7 +163,7 @@ TEST_F(SystemDeviceTraceTest, ofAResultClassThatIsNotServedHasNoExitMark)
             sequence({request("AssociatorNames").entry(), Built, lookedUp(Class, "X", 1205)})));
 }
 
-TEST_F(SystemDeviceTraceTest, ofASourceWithoutTarget)
+TEST_F(SystemDeviceTraceTest, OfASourceWithoutTarget)
 {
     const Host::ObjectPath& source = capabilities();
     const Lines lookUp = lookedUp(Class, "(null)", 1259);
@@ -182,7 +182,7 @@ TEST_F(SystemDeviceTraceTest, ofASourceWithoutTarget)
     }
 }
 
-TEST_F(SystemDeviceTraceTest, ofATargetThatNobodyHereLeadsTo)
+TEST_F(SystemDeviceTraceTest, OfATargetThatNobodyHereLeadsTo)
 {
     const Host::ObjectPath& source = sensor("B:/2");
     const char* const other = "ZUMLO_SensorElementCapabilities";
@@ -196,7 +196,7 @@ TEST_F(SystemDeviceTraceTest, ofATargetThatNobodyHereLeadsTo)
         ElementsAreArray(expected("AssociatorNames")));
 }
 
-TEST_F(SystemDeviceEmptyTraceTest, ofSensorsThatAreNotThere)
+TEST_F(SystemDeviceEmptyTraceTest, OfSensorsThatAreNotThere)
 {
     const Host::ObjectPath& source = system("host");
     const Lines lookUp = lookedUp(Class, "(null)", 1205);
@@ -215,7 +215,7 @@ TEST_F(SystemDeviceEmptyTraceTest, ofSensorsThatAreNotThere)
             SensorPaths, paths.failure(failed), paths.exit()})));
 }
 
-TEST_F(SystemDeviceTraceTest, ofReferences)
+TEST_F(SystemDeviceTraceTest, OfReferences)
 {
     const Host::ObjectPath& source = sensor("B:/2");
     const Lines lookUp = lookedUp(Class, "(null)", 1221);
@@ -228,7 +228,7 @@ TEST_F(SystemDeviceTraceTest, ofReferences)
         ElementsAreArray(sequence({names.entry(), Built, counted(), lookUp, names.exit()})));
 }
 
-TEST_F(SystemDeviceTraceTest, ofARefusedUpcallHasNoExitMark)
+TEST_F(SystemDeviceTraceTest, OfARefusedUpcallHasNoExitMark)
 {
     systems_.refusal = CMPI_RC_ERR_ACCESS_DENIED;
     const Host::ObjectPath& source = sensor("B:/2");

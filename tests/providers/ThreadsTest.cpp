@@ -19,7 +19,7 @@ namespace ThreadsTests {
 
 using Vorn::NodeLexicon::NodeType;
 
-TEST(ProviderThreads, aFactoryMayRunBesideRequests)
+TEST(ProviderThreadsTest, AFactoryMayRunBesideRequests)
 {
     const Testing::ScriptedMachine machine({{NodeType::Temperature, "/temp1", "CPU"}});
     const Host::Broker broker;

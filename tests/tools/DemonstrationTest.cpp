@@ -18,7 +18,7 @@ using namespace Testing;
 const std::string demonstration = SENSOR_PROFILE_SOURCE_DIR "/schema/demo-model.json";
 const std::string golden = SENSOR_PROFILE_SOURCE_DIR "/tests/data/tools/demonstration-list.txt";
 
-TEST(Demonstration, ListIsTheGoldenOutput)
+TEST(DemonstrationTest, ListIsTheGoldenOutput)
 {
     const Ended ended =
         run({"list", "--model", demonstration}, {.environment = {{"COLUMNS", "80"}}});
@@ -27,7 +27,7 @@ TEST(Demonstration, ListIsTheGoldenOutput)
     EXPECT_EQ(ended.out, contentOf(golden));
 }
 
-TEST(Demonstration, ListFitsATerminalWithoutCuttingNames)
+TEST(DemonstrationTest, ListFitsATerminalWithoutCuttingNames)
 {
     const Ended ended = runOnTerminal({"list", "--model", demonstration, "--color=never"}, 80);
     EXPECT_THAT(ended.out, testing::Not(testing::HasSubstr("…")));
@@ -37,14 +37,14 @@ TEST(Demonstration, ListFitsATerminalWithoutCuttingNames)
     }
 }
 
-TEST(Demonstration, DocumentHoldsEveryNodeOfTheFile)
+TEST(DemonstrationTest, DocumentHoldsEveryNodeOfTheFile)
 {
     const json file = json::parse(contentOf(demonstration));
     const json document = json::parse(run({"list", "--json", "--model", demonstration}).out);
     EXPECT_EQ(document["instances"].size(), file["nodes"].size());
 }
 
-TEST(Demonstration, EverySensorCanBeFetchedByItsId)
+TEST(DemonstrationTest, EverySensorCanBeFetchedByItsId)
 {
     const json document = json::parse(run({"list", "--json", "--model", demonstration}).out);
     for (const json& instance : document["instances"]) {
@@ -55,7 +55,7 @@ TEST(Demonstration, EverySensorCanBeFetchedByItsId)
     }
 }
 
-TEST(Demonstration, RecordReplaysToTheSameOutput)
+TEST(DemonstrationTest, RecordReplaysToTheSameOutput)
 {
     const TemporaryFolder folder;
     const std::string file = (folder.path() / "record.json").string();

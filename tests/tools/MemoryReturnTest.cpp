@@ -87,12 +87,12 @@ std::size_t leftBehindBy(
     return after > before ? after - before : 0;
 }
 
-TEST(MemoryReturn, WhatLargeAnswersLeaveFreeGoesBackToTheSystem)
+TEST(MemoryReturnTest, WhatLargeAnswersLeaveFreeGoesBackToTheSystem)
 {
     EXPECT_LT(leftBehindBy(10'000), 16U);
 }
 
-TEST(MemoryReturn, SmallerAnswersKeepItForTheNext)
+TEST(MemoryReturnTest, SmallerAnswersKeepItForTheNext)
 {
     EXPECT_GT(leftBehindBy(9'999), 48U);
 }
@@ -104,7 +104,7 @@ std::string messageOf(std::size_t size)
     return call + std::string(size - call.size(), ' ');
 }
 
-TEST(MemoryReturn, WhatLargeMessagesLeaveFreeGoesBackToTheSystem)
+TEST(MemoryReturnTest, WhatLargeMessagesLeaveFreeGoesBackToTheSystem)
 {
     EXPECT_LT(leftBehindBy(1, messageOf(std::size_t{64} << 10)), 16U);
     EXPECT_LT(leftBehindBy(0, messageOf(std::size_t{64} << 10)), 16U);

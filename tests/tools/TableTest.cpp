@@ -20,7 +20,7 @@ Table sample()
     return table;
 }
 
-TEST(Table, ColumnsAreAsWideAsTheirWidestCell)
+TEST(TableTest, ColumnsAreAsWideAsTheirWidestCell)
 {
     EXPECT_EQ(sample().toText(unlimited, false), "NAME                VALUE      STATE\n"
                                                  "a rather long name    1.5 V    Normal\n"
@@ -28,7 +28,7 @@ TEST(Table, ColumnsAreAsWideAsTheirWidestCell)
                                                  "x                       -\n");
 }
 
-TEST(Table, FirstColumnGivesWay)
+TEST(TableTest, FirstColumnGivesWay)
 {
     EXPECT_EQ(sample().toText(34, false), "NAME           VALUE      STATE\n"
                                           "a rather lon…    1.5 V    Normal\n"
@@ -36,13 +36,13 @@ TEST(Table, FirstColumnGivesWay)
                                           "x                  -\n");
 }
 
-TEST(Table, FirstColumnKeepsAFewCharactersHoweverNarrowTheLine)
+TEST(TableTest, FirstColumnKeepsAFewCharactersHoweverNarrowTheLine)
 {
     const std::string narrow = sample().toText(1, false);
     EXPECT_NE(narrow.find("\na rather lo…    1.5 V    Normal\n"), std::string::npos) << narrow;
 }
 
-TEST(Table, ColorsOnlyTheTextOfACell)
+TEST(TableTest, ColorsOnlyTheTextOfACell)
 {
     const std::string colored = sample().toText(unlimited, true);
     EXPECT_NE(
@@ -51,7 +51,7 @@ TEST(Table, ColorsOnlyTheTextOfACell)
     EXPECT_NE(colored.find("    \x1B[2m-\x1B[0m\n"), std::string::npos);
 }
 
-TEST(Table, WithoutRowsHasItsTitles)
+TEST(TableTest, WithoutRowsHasItsTitles)
 {
     EXPECT_EQ(Table({{"A"}, {"B"}}).toText(unlimited, false), "A  B\n");
 }

@@ -13,7 +13,7 @@ namespace {
 
 using namespace Tools;
 
-TEST(Scaled, AppliesThePowerOfTen)
+TEST(ScaledTest, AppliesThePowerOfTen)
 {
     EXPECT_EQ(scaled(12345, -3), "12.345");
     EXPECT_EQ(scaled(41, 0), "41");
@@ -21,7 +21,7 @@ TEST(Scaled, AppliesThePowerOfTen)
     EXPECT_EQ(scaled(-12345, -3), "-12.345");
 }
 
-TEST(Scaled, FillsUpWithZeros)
+TEST(ScaledTest, FillsUpWithZeros)
 {
     EXPECT_EQ(scaled(0, -3), "0.000");
     EXPECT_EQ(scaled(5, -3), "0.005");
@@ -30,7 +30,7 @@ TEST(Scaled, FillsUpWithZeros)
     EXPECT_EQ(scaled(0, 4), "0");
 }
 
-TEST(Scaled, KnowsTheExtremes)
+TEST(ScaledTest, KnowsTheExtremes)
 {
     EXPECT_EQ(scaled(std::numeric_limits<std::int32_t>::min(), -3), "-2147483.648");
     EXPECT_EQ(scaled(std::numeric_limits<std::int64_t>::min(), -18), "-9.223372036854775808");
@@ -38,7 +38,7 @@ TEST(Scaled, KnowsTheExtremes)
     EXPECT_EQ(scaled(7, 40), "7e40");
 }
 
-TEST(ScaledToHundredths, RoundsFractions)
+TEST(ScaledToHundredthsTest, RoundsFractions)
 {
     EXPECT_EQ(scaledToHundredths(12599, -3), "12.60");
     EXPECT_EQ(scaledToHundredths(3134, -3), "3.13");
@@ -49,7 +49,7 @@ TEST(ScaledToHundredths, RoundsFractions)
     EXPECT_EQ(scaledToHundredths(9999, -3), "10.00");
 }
 
-TEST(ScaledToHundredths, LeavesTheRestAlone)
+TEST(ScaledToHundredthsTest, LeavesTheRestAlone)
 {
     EXPECT_EQ(scaledToHundredths(1500, 0), "1500");
     EXPECT_EQ(scaledToHundredths(125, -1), "12.5");
@@ -60,7 +60,7 @@ TEST(ScaledToHundredths, LeavesTheRestAlone)
     EXPECT_EQ(scaledToHundredths(7, -40), "7e-40");
 }
 
-TEST(WithoutTrailingZeros, TouchesFractionsOnly)
+TEST(WithoutTrailingZerosTest, TouchesFractionsOnly)
 {
     EXPECT_EQ(withoutTrailingZeros("12.500"), "12.5");
     EXPECT_EQ(withoutTrailingZeros("12.000"), "12");
@@ -69,7 +69,7 @@ TEST(WithoutTrailingZeros, TouchesFractionsOnly)
     EXPECT_EQ(withoutTrailingZeros("7e-20"), "7e-20");
 }
 
-TEST(UnitSymbol, HasTheCommonSymbols)
+TEST(UnitSymbolTest, HasTheCommonSymbols)
 {
     EXPECT_EQ(unitSymbol(2), "°C");
     EXPECT_EQ(unitSymbol(5), "V");
@@ -77,19 +77,19 @@ TEST(UnitSymbol, HasTheCommonSymbols)
     EXPECT_EQ(unitSymbol(65), "%");
 }
 
-TEST(UnitSymbol, IsTheValueMapsTextElsewhere)
+TEST(UnitSymbolTest, IsTheValueMapsTextElsewhere)
 {
     EXPECT_EQ(unitSymbol(18), "CFM");
     EXPECT_EQ(unitSymbol(51), "Moles");
 }
 
-TEST(UnitSymbol, IsEmptyWhereNoUnitIsKnown)
+TEST(UnitSymbolTest, IsEmptyWhereNoUnitIsKnown)
 {
     for (const std::uint64_t code : {0U, 1U, 67U, 65535U})
         EXPECT_EQ(unitSymbol(code), "") << code;
 }
 
-TEST(ValueMaps, KnowTheirFirstAndLastCodes)
+TEST(ValueMapsTest, KnowTheirFirstAndLastCodes)
 {
     struct Expected {
         const char* property;
@@ -114,7 +114,7 @@ TEST(ValueMaps, KnowTheirFirstAndLastCodes)
         EXPECT_EQ(meaningOf(expected.property, expected.code), expected.text) << expected.property;
 }
 
-TEST(ValueMaps, HaveNoTextForOtherCodesAndProperties)
+TEST(ValueMapsTest, HaveNoTextForOtherCodesAndProperties)
 {
     EXPECT_EQ(meaningOf("SensorType", 17), "");
     EXPECT_EQ(meaningOf("HealthState", 6), "");

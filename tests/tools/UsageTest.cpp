@@ -12,7 +12,7 @@ using testing::MatchesRegex;
 using testing::StartsWith;
 using namespace Testing;
 
-TEST(Usage, HelpGoesToStandardOutput)
+TEST(UsageTest, HelpGoesToStandardOutput)
 {
     const Ended ended = run({"--help"});
     EXPECT_EQ(ended.code, 0);
@@ -21,7 +21,7 @@ TEST(Usage, HelpGoesToStandardOutput)
                                HasSubstr("record"), HasSubstr("Exit codes")));
 }
 
-TEST(Usage, EveryCommandHasItsHelp)
+TEST(UsageTest, EveryCommandHasItsHelp)
 {
     for (const char* const command : {"list", "get", "walk", "record", "serve"}) {
         const Ended ended = run({command, "--help"});
@@ -30,7 +30,7 @@ TEST(Usage, EveryCommandHasItsHelp)
     }
 }
 
-TEST(Usage, HelpFitsIntoEightyColumns)
+TEST(UsageTest, HelpFitsIntoEightyColumns)
 {
     for (const std::vector<std::string>& arguments :
         std::vector<std::vector<std::string>>{{"--help"}, {"list", "--help"}, {"get", "--help"},
@@ -39,14 +39,14 @@ TEST(Usage, HelpFitsIntoEightyColumns)
             EXPECT_LE(line.size(), 80U) << line;
 }
 
-TEST(Usage, VersionNamesTheToolAndTheInterface)
+TEST(UsageTest, VersionNamesTheToolAndTheInterface)
 {
     const Ended ended = run({"--version"});
     EXPECT_EQ(ended.code, 0);
     EXPECT_THAT(ended.out, MatchesRegex("sensorctl [0-9]+\\.[0-9]+\\.[0-9]+ \\(CMPI 2\\.0\\)\n"));
 }
 
-TEST(Usage, WrongUsageIsSaidAndEndsWithTwo)
+TEST(UsageTest, WrongUsageIsSaidAndEndsWithTwo)
 {
     for (const std::vector<std::string>& arguments : std::vector<std::vector<std::string>>{{},
              {"frobnicate"}, {"list", "extra"}, {"list", "--frobnicate"}, {"list", "--model"},
@@ -60,7 +60,7 @@ TEST(Usage, WrongUsageIsSaidAndEndsWithTwo)
     }
 }
 
-TEST(Usage, WhatWasTypedIsNotObeyedByTheTerminal)
+TEST(UsageTest, WhatWasTypedIsNotObeyedByTheTerminal)
 {
     EXPECT_THAT(run({"\x1B[31m"}).err, HasSubstr("\\x1B[31m"));
 }

@@ -10,26 +10,26 @@ using namespace Tools;
 
 constexpr const char* replacement = "\xEF\xBF\xBD";
 
-TEST(Printable, LeavesTextAlone)
+TEST(PrintableTest, LeavesTextAlone)
 {
     for (const char* const text : {"", "CPU 1 Temp", "Größe", "温度", "\xF0\x9F\x94\xA5", "\\x1B"})
         EXPECT_EQ(printable(text), text);
 }
 
-TEST(Printable, EscapesControlCharacters)
+TEST(PrintableTest, EscapesControlCharacters)
 {
     EXPECT_EQ(printable("a\nb\tc\rd"), "a\\nb\\tc\\rd");
     EXPECT_EQ(printable(std::string_view("\0\x1F\x7F", 3)), "\\x00\\x1F\\x7F");
     EXPECT_EQ(printable("\xC2\x80\xC2\x9F\xC2\xA0"), "\\u0080\\u009F\xC2\xA0");
 }
 
-TEST(Printable, EscapesWhatReordersOrEndsLines)
+TEST(PrintableTest, EscapesWhatReordersOrEndsLines)
 {
     EXPECT_EQ(printable("\xE2\x80\xA8\xE2\x80\xA9"), "\\u2028\\u2029");
     EXPECT_EQ(printable("\xE2\x80\xAE\xE2\x81\xA6\xD8\x9C"), "\\u202E\\u2066\\u061C");
 }
 
-TEST(Printable, ReplacesBytesThatAreNoCharacters)
+TEST(PrintableTest, ReplacesBytesThatAreNoCharacters)
 {
     const std::string one = replacement;
     EXPECT_EQ(printable("\xFF"
@@ -46,7 +46,7 @@ TEST(Printable, ReplacesBytesThatAreNoCharacters)
     EXPECT_EQ(printable("\xF4\x90\x80\x80"), one + one + one + one); // beyond Unicode
 }
 
-TEST(DisplayWidth, CountsColumnsNotBytes)
+TEST(DisplayWidthTest, CountsColumnsNotBytes)
 {
     EXPECT_EQ(displayWidth(""), 0U);
     EXPECT_EQ(displayWidth("abc"), 3U);
@@ -60,13 +60,13 @@ TEST(DisplayWidth, CountsColumnsNotBytes)
     EXPECT_EQ(displayWidth(replacement), 1U);
 }
 
-TEST(CutToWidth, LeavesTextThatFits)
+TEST(CutToWidthTest, LeavesTextThatFits)
 {
     EXPECT_EQ(cutToWidth("abc", 3), "abc");
     EXPECT_EQ(cutToWidth("温度", 4), "温度");
 }
 
-TEST(CutToWidth, EndsInAnEllipsisAtACharacter)
+TEST(CutToWidthTest, EndsInAnEllipsisAtACharacter)
 {
     EXPECT_EQ(cutToWidth("abcd", 3), "ab…");
     EXPECT_EQ(cutToWidth("Größe!", 4), "Grö…");
@@ -75,7 +75,7 @@ TEST(CutToWidth, EndsInAnEllipsisAtACharacter)
     EXPECT_EQ(cutToWidth("abc", 1), "…");
 }
 
-TEST(CutToWidth, KeepsAccentsWithTheirLetter)
+TEST(CutToWidthTest, KeepsAccentsWithTheirLetter)
 {
     EXPECT_EQ(cutToWidth("abe\xCC\x81xyz", 4), "abe\xCC\x81…");
 }

@@ -7,9 +7,9 @@
 #include "host/broker/Broker.h"
 #include "host/broker/Refusal.h"
 #include "host/broker/Request.h"
-#include "host/cimxml/ResponseWriter.h"
 #include "host/cimxml/Message.h"
 #include "host/cimxml/RequestError.h"
+#include "host/cimxml/ResponseWriter.h"
 #include "tests/host/repository/MofTest.h"
 
 #include <gmock/gmock.h>

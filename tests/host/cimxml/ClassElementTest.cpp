@@ -29,7 +29,7 @@ protected:
     }
 };
 
-TEST_F(ClassElementTest, writesWhatAClassDeclares)
+TEST_F(ClassElementTest, WritesWhatAClassDeclares)
 {
     EXPECT_EQ(written("Thing", {}),
         R"(<CLASS NAME="Thing"><PROPERTY NAME="Name" TYPE="string"></PROPERTY>)"
@@ -41,7 +41,7 @@ TEST_F(ClassElementTest, writesWhatAClassDeclares)
         R"(<PROPERTY NAME="Reading" TYPE="real64"></PROPERTY></CLASS>)");
 }
 
-TEST_F(ClassElementTest, tellsOriginAndInheritance)
+TEST_F(ClassElementTest, TellsOriginAndInheritance)
 {
     ObjectSelection selection;
     selection.includeClassOrigin = true;
@@ -53,7 +53,7 @@ TEST_F(ClassElementTest, tellsOriginAndInheritance)
         R"(</PROPERTY><PROPERTY NAME="Percent" TYPE="uint8" CLASSORIGIN="Gauge"></PROPERTY></CLASS>)");
 }
 
-TEST_F(ClassElementTest, writesQualifiersOnRequest)
+TEST_F(ClassElementTest, WritesQualifiersOnRequest)
 {
     ObjectSelection selection;
     selection.includeQualifiers = true;
@@ -73,7 +73,7 @@ TEST_F(ClassElementTest, writesQualifiersOnRequest)
                             R"(TRANSLATABLE="true"><VALUE>A &lt;thing&gt;</VALUE></QUALIFIER>)"));
 }
 
-TEST_F(ClassElementTest, writesQualifierDeclarations)
+TEST_F(ClassElementTest, WritesQualifierDeclarations)
 {
     EXPECT_EQ(qualifier("Key"),
         R"(<QUALIFIER.DECLARATION NAME="Key" TYPE="boolean" ISARRAY="false" OVERRIDABLE="false">)"

@@ -23,7 +23,7 @@ const std::string Gauge = classOf("ClassName", "gauge");
 const std::string Filters = valueOf("Role", "Owner") + classOf("ResultClass", "single");
 const std::string MoreFilters = valueOf("ResultRole", "Part") + classOf("AssocClass", "LINK");
 
-TEST_F(OperationTest, takesEveryOperationWithWhatItNeeds)
+TEST_F(OperationTest, TakesEveryOperationWithWhatItNeeds)
 {
     const std::string pull = valueOf("EnumerationContext", "c") + valueOf("MaxObjectCount", "9");
     const std::vector<std::tuple<std::string, std::string, OperationKind>> operations = {
@@ -65,7 +65,7 @@ TEST_F(OperationTest, takesEveryOperationWithWhatItNeeds)
     }
 }
 
-TEST_F(OperationTest, defaultsAreThoseOfTheOperation)
+TEST_F(OperationTest, DefaultsAreThoseOfTheOperation)
 {
     const auto get = read(call("GetInstance", Instance));
     EXPECT_TRUE(get.selection.localOnly);
@@ -84,7 +84,7 @@ TEST_F(OperationTest, defaultsAreThoseOfTheOperation)
     EXPECT_EQ(open.maxObjectCount, 0U);
 }
 
-TEST_F(OperationTest, readsFlagsInAnyLetterCase)
+TEST_F(OperationTest, ReadsFlagsInAnyLetterCase)
 {
     const auto operation = read(call("getINSTANCE", Instance + valueOf("localonly", "FALSE") +
                                                         valueOf("IncludeQualifiers", " TRUE ") +
@@ -96,7 +96,7 @@ TEST_F(OperationTest, readsFlagsInAnyLetterCase)
         "4 parameter LocalOnly: \"1\" is no value of type boolean");
 }
 
-TEST_F(OperationTest, anEmptyPropertyListIsOtherThanNone)
+TEST_F(OperationTest, AnEmptyPropertyListIsOtherThanNone)
 {
     const auto listOf = [this](const std::string& list) {
         return read(call("GetInstance", Instance + list)).selection.properties;
@@ -110,7 +110,7 @@ TEST_F(OperationTest, anEmptyPropertyListIsOtherThanNone)
         "4 parameter PropertyList must be a VALUE.ARRAY, not a VALUE");
 }
 
-TEST_F(OperationTest, readsAssociationFiltersAsDeclared)
+TEST_F(OperationTest, ReadsAssociationFiltersAsDeclared)
 {
     const auto operation = read(call("Associators", Object + Filters + MoreFilters));
     EXPECT_EQ(operation.associationClass, "Link");
@@ -123,14 +123,14 @@ TEST_F(OperationTest, readsAssociationFiltersAsDeclared)
         read(call("AssociatorNames", Object + classOf("AssocClass", ""))).associationClass, "");
 }
 
-TEST_F(OperationTest, takesAClassAsTheSourceOfAssociations)
+TEST_F(OperationTest, TakesAClassAsTheSourceOfAssociations)
 {
     const auto operation = read(call("References", classOf("ObjectName", "GAUGE")));
     EXPECT_EQ(operation.className, "Gauge");
     EXPECT_EQ(operation.path, nullptr);
 }
 
-TEST_F(OperationTest, readsWhatEnumerationsAreOpenedWith)
+TEST_F(OperationTest, ReadsWhatEnumerationsAreOpenedWith)
 {
     const auto operation = read(call("OpenEnumerateInstances",
         Gauge + valueOf("FilterQuery", "q") + valueOf("FilterQueryLanguage", "DMTF:FQL") +
@@ -146,7 +146,7 @@ TEST_F(OperationTest, readsWhatEnumerationsAreOpenedWith)
         "4 parameter MaxObjectCount: \"4294967296\" is no value of type uint32");
 }
 
-TEST_F(OperationTest, namesTheParameterThatIsWrong)
+TEST_F(OperationTest, NamesTheParameterThatIsWrong)
 {
     EXPECT_EQ(refusalOf(call("GetInstance")), "4 GetInstance needs parameter InstanceName");
     EXPECT_EQ(refusalOf(call("GetInstance", "<IPARAMVALUE NAME='InstanceName'/>")),
@@ -163,7 +163,7 @@ TEST_F(OperationTest, namesTheParameterThatIsWrong)
         StartsWith("request-not-loosely-valid "));
 }
 
-TEST_F(OperationTest, refusesUnknownOperationsAndNamespaces)
+TEST_F(OperationTest, RefusesUnknownOperationsAndNamespaces)
 {
     EXPECT_EQ(refusalOf(call("CreateClass")), "7 operation \"CreateClass\" is not offered");
     std::string body = call("EnumerateQualifiers");
@@ -171,7 +171,7 @@ TEST_F(OperationTest, refusesUnknownOperationsAndNamespaces)
     EXPECT_EQ(refusalOf(body), "3 there is no namespace \"root/none\"");
 }
 
-TEST_F(OperationTest, keepsTheSpellingOfAnUnknownClass)
+TEST_F(OperationTest, KeepsTheSpellingOfAnUnknownClass)
 {
     EXPECT_EQ(read(call("GetClass", classOf("ClassName", "Nothing"))).className, "Nothing");
 }

@@ -20,7 +20,7 @@ std::string replaced(std::string text, const std::string& from, const std::strin
 
 const std::string Good = call("EnumerateQualifiers");
 
-TEST(OutcomeTest, readsWhatTheMessageSays)
+TEST(OutcomeTest, ReadsWhatTheMessageSays)
 {
     const Message message(Good);
     EXPECT_EQ(message.id(), "4711");
@@ -30,7 +30,7 @@ TEST(OutcomeTest, readsWhatTheMessageSays)
     EXPECT_TRUE(message.isIntrinsic());
 }
 
-TEST(OutcomeTest, passesOverWhatTheProtocolDoesNotKnow)
+TEST(OutcomeTest, PassesOverWhatTheProtocolDoesNotKnow)
 {
     EXPECT_EQ(
         outcomeOf(replaced(Good, "<SIMPLEREQ>", "<X-EXTRA>t</X-EXTRA><SIMPLEREQ Y='1'>")), "read");
@@ -38,7 +38,7 @@ TEST(OutcomeTest, passesOverWhatTheProtocolDoesNotKnow)
     EXPECT_EQ(outcomeOf(replaced(Good, "<SIMPLEREQ>", "<!-- c --><?pi x?> <SIMPLEREQ>")), "read");
 }
 
-TEST(OutcomeTest, refusesWhatIsNotWellFormed)
+TEST(OutcomeTest, RefusesWhatIsNotWellFormed)
 {
     for (const std::string body : {"", "   ", "text", "<CIM", "<CIM>", "<CIM></MIC>",
              "<CIM/><CIM/>", "<CIM/>text", "</CIM>", "<CIM a=1/>", "<CIM a='1' a='2'/>",
@@ -65,7 +65,7 @@ TEST(OutcomeTest, RefusesUtf16WhicheverEndComesFirst)
         EXPECT_EQ(errorOf(body), "line 1, byte 0: only the encoding UTF-8 is read");
 }
 
-TEST(OutcomeTest, refusesDocumentTypesAndEntities)
+TEST(OutcomeTest, RefusesDocumentTypesAndEntities)
 {
     EXPECT_EQ(outcomeOf("<!DOCTYPE CIM><CIM/>"), "request-not-valid");
     EXPECT_EQ(outcomeOf("<!DOCTYPE CIM SYSTEM 'file:///etc/passwd'><CIM/>"), "request-not-valid");
@@ -74,7 +74,7 @@ TEST(OutcomeTest, refusesDocumentTypesAndEntities)
     EXPECT_EQ(outcomeOf("<CIM><!ENTITY a 'b'></CIM>"), "request-not-well-formed");
 }
 
-TEST(OutcomeTest, refusesVersionsOfAnotherKind)
+TEST(OutcomeTest, RefusesVersionsOfAnotherKind)
 {
     EXPECT_EQ(outcomeOf(replaced(Good, "CIMVERSION=\"2.0", "CIMVERSION=\"3.0")),
         "unsupported-cim-version");
@@ -87,7 +87,7 @@ TEST(OutcomeTest, refusesVersionsOfAnotherKind)
         "read");
 }
 
-TEST(OutcomeTest, refusesWhatLacksSomething)
+TEST(OutcomeTest, RefusesWhatLacksSomething)
 {
     for (const std::string part : {" CIMVERSION=\"2.0\"", " DTDVERSION=\"2.0\"", " ID=\"4711\"",
              " PROTOCOLVERSION=\"1.0\"", " NAME=\"EnumerateQualifiers\"", " NAME=\"root\""})
@@ -101,7 +101,7 @@ TEST(OutcomeTest, refusesWhatLacksSomething)
     EXPECT_EQ(outcomeOf(withHead("<SIMPLEREQ><VALUE/></SIMPLEREQ>")), "request-not-loosely-valid");
 }
 
-TEST(OutcomeTest, refusesSeveralRequestsAndWhatIsNone)
+TEST(OutcomeTest, RefusesSeveralRequestsAndWhatIsNone)
 {
     EXPECT_EQ(outcomeOf(withHead("<MULTIREQ><SIMPLEREQ/><SIMPLEREQ/></MULTIREQ>")),
         "multiple-requests-unsupported");
@@ -115,7 +115,7 @@ TEST(OutcomeTest, refusesSeveralRequestsAndWhatIsNone)
         "request-not-loosely-valid");
 }
 
-TEST(OutcomeTest, saysWhatIsWrongAndWhere)
+TEST(OutcomeTest, SaysWhatIsWrongAndWhere)
 {
     EXPECT_EQ(errorOf("<CIM>\n<A>\n</B></CIM>"), "line 3, byte 12: mismatched tag");
     EXPECT_EQ(errorOf("<CIM\nCIMVERSION='2.0'/>"),
@@ -124,7 +124,7 @@ TEST(OutcomeTest, saysWhatIsWrongAndWhere)
         HasSubstr("line 2, byte"));
 }
 
-TEST(OutcomeTest, boundsDepthElementsAndAttributes)
+TEST(OutcomeTest, BoundsDepthElementsAndAttributes)
 {
     std::string deep;
     for (int level = 0; level < 100'000; ++level)

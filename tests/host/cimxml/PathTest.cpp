@@ -35,7 +35,7 @@ protected:
 
 constexpr const char* At = "20260102030405.000006+060";
 
-TEST_F(PathTest, typesKeysAsTheClassDeclaresThem)
+TEST_F(PathTest, TypesKeysAsTheClassDeclaresThem)
 {
     const auto operation = read(call("GetInstance", parameter("InstanceName", thing())));
     EXPECT_EQ(operation.path->toText(), "root/test:Thing.Name=\"a\",Index=7");
@@ -45,13 +45,13 @@ TEST_F(PathTest, typesKeysAsTheClassDeclaresThem)
         "root/test:Flag.On=TRUE,Level=-128,At=\"" + std::string(At) + "\"");
 }
 
-TEST_F(PathTest, spellsNamesAsTheyAreDeclared)
+TEST_F(PathTest, SpellsNamesAsTheyAreDeclared)
 {
     EXPECT_EQ(pathText(instanceName("tHING", binding("NAME", "A b ") + binding("index", "+1"))),
         "root/test:Thing.Name=\"A b \",Index=1");
 }
 
-TEST_F(PathTest, takesTheOnlyKeyWithoutItsName)
+TEST_F(PathTest, TakesTheOnlyKeyWithoutItsName)
 {
     EXPECT_EQ(pathText(instanceName("single", "<KEYVALUE VALUETYPE='string'>x</KEYVALUE>")),
         "root/test:Single.InstanceID=\"x\"");
@@ -63,7 +63,7 @@ TEST_F(PathTest, takesTheOnlyKeyWithoutItsName)
         testing::StartsWith("request-not-loosely-valid "));
 }
 
-TEST_F(PathTest, readsTextWithEntitiesCdataAndBlanks)
+TEST_F(PathTest, ReadsTextWithEntitiesCdataAndBlanks)
 {
     EXPECT_EQ(pathText(instanceName("Single",
                   "<KEYVALUE> &lt;&amp;&#65;&#x1F600;<![CDATA[<b>]]><!-- c --> </KEYVALUE>")),
@@ -73,7 +73,7 @@ TEST_F(PathTest, readsTextWithEntitiesCdataAndBlanks)
     EXPECT_EQ(pathText(instanceName("Single", "<KEYVALUE/>")), "root/test:Single.InstanceID=\"\"");
 }
 
-TEST_F(PathTest, namesTheKeyWhoseValueDoesNotFit)
+TEST_F(PathTest, NamesTheKeyWhoseValueDoesNotFit)
 {
     EXPECT_EQ(pathRefusal(instanceName("Thing", binding("Index", "65536"))),
         "4 key \"Index\": \"65536\" is no value of type uint16");
@@ -87,7 +87,7 @@ TEST_F(PathTest, namesTheKeyWhoseValueDoesNotFit)
     EXPECT_THAT(pathRefusal(flag("true", "1", "now")), testing::StartsWith("4 key \"At\": "));
 }
 
-TEST_F(PathTest, boundsTheKeysOfClassesThatAreNotKnown)
+TEST_F(PathTest, BoundsTheKeysOfClassesThatAreNotKnown)
 {
     std::string keys;
     for (int number = 0; number < 1000; ++number)
@@ -97,7 +97,7 @@ TEST_F(PathTest, boundsTheKeysOfClassesThatAreNotKnown)
         "4 more than 1000 keys of class \"Other\", which is not known");
 }
 
-TEST_F(PathTest, refusesKeysTheClassDoesNotHave)
+TEST_F(PathTest, RefusesKeysTheClassDoesNotHave)
 {
     EXPECT_EQ(pathRefusal(instanceName("Thing", binding("Label", "x"))),
         "4 key \"Label\" is none of class Thing");
@@ -110,7 +110,7 @@ TEST_F(PathTest, refusesKeysTheClassDoesNotHave)
     EXPECT_THAT(pathRefusal("<INSTANCENAME/>"), testing::StartsWith("request-not-loosely-valid "));
 }
 
-TEST_F(PathTest, readsReferencesInAllTheirForms)
+TEST_F(PathTest, ReadsReferencesInAllTheirForms)
 {
     const std::string local = "<LOCALNAMESPACEPATH><NAMESPACE NAME='ROOT'/>"
                               "<NAMESPACE NAME='test'/></LOCALNAMESPACEPATH>";
@@ -131,7 +131,7 @@ TEST_F(PathTest, readsReferencesInAllTheirForms)
         testing::StartsWith("request-not-loosely-valid "));
 }
 
-TEST_F(PathTest, boundsHowDeepPathsStandInOneAnother)
+TEST_F(PathTest, BoundsHowDeepPathsStandInOneAnother)
 {
     std::string name = instanceName("Other", "");
     const auto wrap = [&name] {
@@ -145,7 +145,7 @@ TEST_F(PathTest, boundsHowDeepPathsStandInOneAnother)
     EXPECT_EQ(pathRefusal(name), "4 paths more than 8 deep in one another");
 }
 
-TEST_F(PathTest, goesByTheKeyItselfWhereTheClassIsNotKnown)
+TEST_F(PathTest, GoesByTheKeyItselfWhereTheClassIsNotKnown)
 {
     EXPECT_EQ(otherKey("", "5").type(), CMPI_string);
     EXPECT_EQ(otherKey("VALUETYPE='string'", "5").type(), CMPI_string);
@@ -160,7 +160,7 @@ TEST_F(PathTest, goesByTheKeyItselfWhereTheClassIsNotKnown)
     EXPECT_EQ(pathRefusal(keyOf("TYPE='x'", "x")), "4 key \"K\": \"x\" is no type of a value");
 }
 
-TEST_F(PathTest, readsWhatItWroteAsTheSame)
+TEST_F(PathTest, ReadsWhatItWroteAsTheSame)
 {
     const std::string part =
         "<KEYBINDING NAME='Part'><VALUE.REFERENCE>" +

@@ -116,7 +116,7 @@ protected:
     }
 };
 
-TEST_F(ResponseTest, wrapsInstancesAsTheOperationDoes)
+TEST_F(ResponseTest, WrapsInstancesAsTheOperationDoes)
 {
     EXPECT_EQ(instanceBy(OperationKind::getInstance), InstanceXml);
     EXPECT_EQ(instanceBy(OperationKind::enumerateInstances),
@@ -130,7 +130,7 @@ TEST_F(ResponseTest, wrapsInstancesAsTheOperationDoes)
             "<VALUE.INSTANCEWITHPATH>" + PathXml + InstanceXml + "</VALUE.INSTANCEWITHPATH>");
 }
 
-TEST_F(ResponseTest, writesAnInstanceTheSameWhateverWasWrittenBefore)
+TEST_F(ResponseTest, WritesAnInstanceTheSameWhateverWasWrittenBefore)
 {
     const Host::ClassDeclaration* const thing = &Testing::classNamed(*repository, "Thing");
     const Host::ClassDeclaration* const gauge = &Testing::classNamed(*repository, "Gauge");
@@ -163,7 +163,7 @@ TEST_F(ResponseTest, writesAnInstanceTheSameWhateverWasWrittenBefore)
         }
 }
 
-TEST_F(ResponseTest, wrapsPathsAndClassNamesAsTheOperationDoes)
+TEST_F(ResponseTest, WrapsPathsAndClassNamesAsTheOperationDoes)
 {
     EXPECT_EQ(pathBy(OperationKind::enumerateInstanceNames), NameXml);
     EXPECT_EQ(pathBy(OperationKind::associatorNames), "<OBJECTPATH>" + PathXml + "</OBJECTPATH>");
@@ -226,7 +226,7 @@ TEST_F(ResponseTest, SaysWhetherAnEnumerationGoesOn)
     EXPECT_EQ(pulled(std::nullopt), expected("TRUE", ""));
 }
 
-TEST_F(ResponseTest, tellsFailuresWithCodeAndText)
+TEST_F(ResponseTest, TellsFailuresWithCodeAndText)
 {
     EXPECT_EQ(errorResponse(Message(call("GetInstance")), CMPI_RC_ERR_NOT_FOUND, "no \"x\" <here>"),
         Head + R"(GetInstance"><ERROR CODE="6" DESCRIPTION="no &quot;x&quot; &lt;here&gt;">)" +
@@ -243,7 +243,7 @@ TEST_F(ResponseTest, WritesTheValueOfAProperty)
     EXPECT_EQ(property(Value::null(CMPI_sint32)), "");
 }
 
-TEST_F(ResponseTest, repeatsWhatTheRequestSaysEscaped)
+TEST_F(ResponseTest, RepeatsWhatTheRequestSaysEscaped)
 {
     std::string body = call("Get&lt;Instance");
     body.replace(body.find("4711"), 4, "&quot;&amp;&#233;");
@@ -252,7 +252,7 @@ TEST_F(ResponseTest, repeatsWhatTheRequestSaysEscaped)
             HasSubstr("ID=\"&quot;&amp;\xC3\xA9\""), HasSubstr("NAME=\"Get&lt;Instance\"")));
 }
 
-TEST_F(ResponseTest, writesValuesOfEveryType)
+TEST_F(ResponseTest, WritesValuesOfEveryType)
 {
     EXPECT_EQ(valueXml(Value::boolean(true)), "<VALUE>TRUE</VALUE>");
     EXPECT_EQ(valueXml(Value::integer(CMPI_sint8, 0x80)), "<VALUE>-128</VALUE>");
@@ -267,7 +267,7 @@ TEST_F(ResponseTest, writesValuesOfEveryType)
     EXPECT_EQ(textXml(""), "<VALUE></VALUE>");
 }
 
-TEST_F(ResponseTest, writesTextThatEveryClientCanRead)
+TEST_F(ResponseTest, WritesTextThatEveryClientCanRead)
 {
     EXPECT_EQ(textXml("<a b='c' d=\"e\">&\t\n"),
         "<VALUE>&lt;a b=&apos;c&apos; d=&quot;e&quot;&gt;&amp;\t\n</VALUE>");
@@ -278,7 +278,7 @@ TEST_F(ResponseTest, writesTextThatEveryClientCanRead)
     EXPECT_EQ(textXml("\xF0\x9F"), "<VALUE>\xEF\xBF\xBD\xEF\xBF\xBD</VALUE>");
 }
 
-TEST_F(ResponseTest, leavesNullsInArraysOut)
+TEST_F(ResponseTest, LeavesNullsInArraysOut)
 {
     Host::Array& array = Host::Array::make(request.arena(), CMPI_uint8, 3);
     array.set(0, Value::integer(CMPI_uint8, 1));
@@ -290,7 +290,7 @@ TEST_F(ResponseTest, leavesNullsInArraysOut)
         R"(<VALUE>1</VALUE><VALUE>3</VALUE></VALUE.ARRAY></PROPERTY.ARRAY></INSTANCE>)");
 }
 
-TEST_F(ResponseTest, takesFromTheClassWhatAValueDoesNotSay)
+TEST_F(ResponseTest, TakesFromTheClassWhatAValueDoesNotSay)
 {
     const auto& declared = Testing::classNamed(*repository, "Gauge");
     Host::Instance& made = emptyInstance("Gauge");
@@ -307,7 +307,7 @@ TEST_F(ResponseTest, takesFromTheClassWhatAValueDoesNotSay)
         R"(CLASSORIGIN="Thing" PROPAGATED="true"></PROPERTY.ARRAY></INSTANCE>)");
 }
 
-TEST_F(ResponseTest, writesReferencesWithWhatTheyKnow)
+TEST_F(ResponseTest, WritesReferencesWithWhatTheyKnow)
 {
     Host::Instance& made = emptyInstance("Link");
     Host::ObjectPath& target = path();
@@ -326,7 +326,7 @@ TEST_F(ResponseTest, writesReferencesWithWhatTheyKnow)
     EXPECT_EQ(instanceXml(made, &declared), begin + NameXml + end);
 }
 
-TEST_F(ResponseTest, writesEmbeddedInstancesAsText)
+TEST_F(ResponseTest, WritesEmbeddedInstancesAsText)
 {
     Host::Instance& inner = emptyInstance("Single");
     inner.setProperty("InstanceID", Value::text(request.arena(), "<"));

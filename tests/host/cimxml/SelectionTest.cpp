@@ -16,13 +16,13 @@ protected:
     const Host::ClassDeclaration& gauge = Testing::classNamed(*repository, "Gauge");
 };
 
-TEST_F(SelectionTest, withoutListAllPropertiesAreSelected)
+TEST_F(SelectionTest, WithoutListAllPropertiesAreSelected)
 {
     EXPECT_TRUE(isSelected({}, &gauge, "Name"));
     EXPECT_TRUE(isSelected({}, nullptr, "Anything"));
 }
 
-TEST_F(SelectionTest, listsAreReadInAnyLetterCase)
+TEST_F(SelectionTest, ListsAreReadInAnyLetterCase)
 {
     ObjectSelection selection;
     selection.properties = {"PERCENT", "name"};
@@ -33,7 +33,7 @@ TEST_F(SelectionTest, listsAreReadInAnyLetterCase)
     EXPECT_FALSE(isSelected(selection, &gauge, "Percent"));
 }
 
-TEST_F(SelectionTest, localIsWhatTheClassDeclares)
+TEST_F(SelectionTest, LocalIsWhatTheClassDeclares)
 {
     ObjectSelection selection;
     selection.localOnly = true;
@@ -44,7 +44,7 @@ TEST_F(SelectionTest, localIsWhatTheClassDeclares)
     EXPECT_TRUE(isSelected(selection, nullptr, "Name"));
 }
 
-TEST_F(SelectionTest, qualifiersAreSelectedOnRequest)
+TEST_F(SelectionTest, QualifiersAreSelectedOnRequest)
 {
     const auto& inherited = *findQualifier(gauge.qualifiers, "Description");
     ASSERT_TRUE(inherited.isPropagated);

@@ -10,7 +10,7 @@
 
 namespace ExportsTests {
 
-TEST(Exports, AreTheSixFactoriesAndNothingElse)
+TEST(ExportsTest, AreTheSixFactoriesAndNothingElse)
 {
     EXPECT_THAT(
         Testing::exportedNames(SENSOR_PROFILE_BINARY_DIR "/lib/libSensorProfileProvider.so"),

@@ -41,29 +41,29 @@ protected:
     std::vector<std::string> arguments_;
 };
 
-TEST_F(ManagerAssociationTest, withoutAssociationClassEachIsAskedByItsOwnName)
+TEST_F(ManagerAssociationTest, WithoutAssociationClassEachIsAskedByItsOwnName)
 {
     EXPECT_THAT(asked("Box", {}), ElementsAre("BoxLink - - -", "ThingLink - - -"));
     EXPECT_EQ(manager_.associatorNames(context(), path("Box"), {}).paths().size(), 2U);
 }
 
-TEST_F(ManagerAssociationTest, aSuperclassOfAssociationsAsksEachByItsOwnName)
+TEST_F(ManagerAssociationTest, ASuperclassOfAssociationsAsksEachByItsOwnName)
 {
     EXPECT_THAT(asked("Box", {.associationClass = "Link"}),
         ElementsAre("BoxLink - - -", "ThingLink - - -"));
 }
 
-TEST_F(ManagerAssociationTest, aNamedAssociationClassIsAskedAlone)
+TEST_F(ManagerAssociationTest, ANamedAssociationClassIsAskedAlone)
 {
     EXPECT_THAT(asked("Box", {.associationClass = "boxlink"}), ElementsAre("BoxLink - - -"));
 }
 
-TEST_F(ManagerAssociationTest, anUnrelatedAssociationClassIsAnEmptyAnswer)
+TEST_F(ManagerAssociationTest, AnUnrelatedAssociationClassIsAnEmptyAnswer)
 {
     EXPECT_THAT(asked("Box", {.associationClass = "Part"}), IsEmpty());
 }
 
-TEST_F(ManagerAssociationTest, unknownClassesAreInvalid)
+TEST_F(ManagerAssociationTest, UnknownClassesAreInvalid)
 {
     EXPECT_EQ(refusalOf([&] { asked("Unheard", {}); }),
         "code 5: there is no class Unheard in root/cimv2");
@@ -72,18 +72,18 @@ TEST_F(ManagerAssociationTest, unknownClassesAreInvalid)
     EXPECT_THAT(refusalOf([&] { asked("Box", {.resultClass = "Nothing"}); }), StartsWith("code 5"));
 }
 
-TEST_F(ManagerAssociationTest, aSourceBelowTheReferencedClassCounts)
+TEST_F(ManagerAssociationTest, ASourceBelowTheReferencedClassCounts)
 {
     EXPECT_THAT(asked("SpecialPart", {}), ElementsAre("BoxLink - - -", "ThingLink - - -"));
     EXPECT_THAT(asked("Idle", {}), ElementsAre("ThingLink - - -"));
 }
 
-TEST_F(ManagerAssociationTest, aSourceAboveTheReferencedClassDoesNot)
+TEST_F(ManagerAssociationTest, ASourceAboveTheReferencedClassDoesNot)
 {
     EXPECT_THAT(asked("Thing", {.associationClass = "BoxLink"}), IsEmpty());
 }
 
-TEST_F(ManagerAssociationTest, rolesThatAreNotTheSourcesExcludeAnAssociation)
+TEST_F(ManagerAssociationTest, RolesThatAreNotTheSourcesExcludeAnAssociation)
 {
     EXPECT_THAT(asked("Box", {.associationClass = "BoxLink", .role = "whole"}),
         ElementsAre("BoxLink - whole -"));
@@ -91,7 +91,7 @@ TEST_F(ManagerAssociationTest, rolesThatAreNotTheSourcesExcludeAnAssociation)
     EXPECT_THAT(asked("Box", {.role = "Other"}), IsEmpty());
 }
 
-TEST_F(ManagerAssociationTest, resultRolesThatAreNotAtTheOtherEndExcludeAnAssociation)
+TEST_F(ManagerAssociationTest, ResultRolesThatAreNotAtTheOtherEndExcludeAnAssociation)
 {
     EXPECT_THAT(asked("Box", {.associationClass = "BoxLink", .resultRole = "PIECE"}),
         ElementsAre("BoxLink - - PIECE"));
@@ -99,7 +99,7 @@ TEST_F(ManagerAssociationTest, resultRolesThatAreNotAtTheOtherEndExcludeAnAssoci
     EXPECT_THAT(asked("Box", {.resultRole = "Other"}), IsEmpty());
 }
 
-TEST_F(ManagerAssociationTest, resultClassesThatCannotBeReachedExcludeAnAssociation)
+TEST_F(ManagerAssociationTest, ResultClassesThatCannotBeReachedExcludeAnAssociation)
 {
     EXPECT_THAT(asked("Box", {.resultClass = "Idle"}), ElementsAre("ThingLink Idle - -"));
     EXPECT_THAT(asked("Box", {.associationClass = "BoxLink", .resultClass = "SpecialPart"}),
@@ -108,7 +108,7 @@ TEST_F(ManagerAssociationTest, resultClassesThatCannotBeReachedExcludeAnAssociat
         ElementsAre("BoxLink - - -")); // all that it leads to is a Thing
 }
 
-TEST_F(ManagerAssociationTest, theSourceKeepsItsKeysAndHasItsClassesRegisteredName)
+TEST_F(ManagerAssociationTest, TheSourceKeepsItsKeysAndHasItsClassesRegisteredName)
 {
     std::vector<std::string> seen;
     script("BoxLinks", [&](const ProviderCall& call) {
@@ -126,7 +126,7 @@ TEST_F(ManagerAssociationTest, theSourceKeepsItsKeysAndHasItsClassesRegisteredNa
         seen, testing::AllOf(testing::SizeIs(4), testing::Each("root/cimv2:Box.Name=\"b\"")));
 }
 
-TEST_F(ManagerAssociationTest, resultsAreOfTheResultClassOrBelowIt)
+TEST_F(ManagerAssociationTest, ResultsAreOfTheResultClassOrBelowIt)
 {
     script("BoxLinks", [this](const ProviderCall& call) {
         for (const char* const each : {"Part", "SpecialPart", "Box", "Unheard"})
@@ -147,7 +147,7 @@ TEST_F(ManagerAssociationTest, resultsAreOfTheResultClassOrBelowIt)
     }
 }
 
-TEST_F(ManagerAssociationTest, referencesGoByTheAssociationClassAsResultClass)
+TEST_F(ManagerAssociationTest, ReferencesGoByTheAssociationClassAsResultClass)
 {
     for (const auto& [provider, className] :
         {std::pair{"BoxLinks", "BoxLink"}, std::pair{"ThingLinks", "Idle"}})
@@ -166,7 +166,7 @@ TEST_F(ManagerAssociationTest, referencesGoByTheAssociationClassAsResultClass)
     EXPECT_THAT(arguments_, ElementsAre("BoxLink -"));
 }
 
-TEST_F(ManagerAssociationTest, anAnswerOutlivesTheFailureOfAnotherProvider)
+TEST_F(ManagerAssociationTest, AnAnswerOutlivesTheFailureOfAnotherProvider)
 {
     script("BoxLinks", [&](const ProviderCall& call) {
         deliver(call, "Part", "of a failed answer");
@@ -177,7 +177,7 @@ TEST_F(ManagerAssociationTest, anAnswerOutlivesTheFailureOfAnotherProvider)
     EXPECT_EQ(found.instances()[0]->property("Name")->text(), "one");
 }
 
-TEST_F(ManagerAssociationTest, aFailureWithoutAnyAnswerIsPassedOn)
+TEST_F(ManagerAssociationTest, AFailureWithoutAnyAnswerIsPassedOn)
 {
     script("ThingLinks", [](const ProviderCall&) { return Ok; });
     script("BoxLinks", [&](const ProviderCall&) { return failure(CMPI_RC_ERR_FAILED, "broken"); });

@@ -16,7 +16,7 @@ constexpr CMPIStatus Ok = {CMPI_RC_OK, nullptr};
 
 using ManagerInstanceTest = Testing::ManagerTest;
 
-TEST_F(ManagerInstanceTest, aClassGoesToItsProvider)
+TEST_F(ManagerInstanceTest, AClassGoesToItsProvider)
 {
     EXPECT_EQ(manager_.enumerateInstances(context(), path("Box"), nullptr).instances().size(), 1U);
     EXPECT_EQ(manager_.enumerateInstanceNames(context(), path("Box")).paths().size(), 1U);
@@ -24,25 +24,25 @@ TEST_F(ManagerInstanceTest, aClassGoesToItsProvider)
         calls_, ElementsAre("Boxes enumerateInstances Box", "Boxes enumerateInstanceNames Box"));
 }
 
-TEST_F(ManagerInstanceTest, aProviderGetsTheNameOfItsClassAsItIsRegistered)
+TEST_F(ManagerInstanceTest, AProviderGetsTheNameOfItsClassAsItIsRegistered)
 {
     manager_.enumerateInstances(context(), path("bOX"), nullptr);
     EXPECT_THAT(calls_, ElementsAre("Boxes enumerateInstances Box"));
 }
 
-TEST_F(ManagerInstanceTest, aSuperclassReachesEveryServedClassBelowIt)
+TEST_F(ManagerInstanceTest, ASuperclassReachesEveryServedClassBelowIt)
 {
     const auto found = manager_.enumerateInstances(context(), path("Thing"), nullptr);
     EXPECT_THAT(delivered(found), ElementsAre("Box", "Part", "SpecialPart"));
 }
 
-TEST_F(ManagerInstanceTest, aServedClassBringsItsSubclassesAlong)
+TEST_F(ManagerInstanceTest, AServedClassBringsItsSubclassesAlong)
 {
     const auto found = manager_.enumerateInstanceNames(context(), path("Part"));
     EXPECT_THAT(delivered(found), ElementsAre("Part", "SpecialPart"));
 }
 
-TEST_F(ManagerInstanceTest, anUnknownClassIsInvalid)
+TEST_F(ManagerInstanceTest, AnUnknownClassIsInvalid)
 {
     const std::string expected = "code 5: there is no class Unheard in root/cimv2";
     EXPECT_EQ(refusalOf([&] { manager_.enumerateInstances(context(), path("Unheard"), nullptr); }),
@@ -51,20 +51,20 @@ TEST_F(ManagerInstanceTest, anUnknownClassIsInvalid)
         refusalOf([&] { manager_.getInstance(context(), path("Unheard"), nullptr); }), expected);
 }
 
-TEST_F(ManagerInstanceTest, aClassWithoutProviderIsNotSupported)
+TEST_F(ManagerInstanceTest, AClassWithoutProviderIsNotSupported)
 {
     const std::string expected = "code 7: no provider serves the class Idle";
     EXPECT_EQ(
         refusalOf([&] { manager_.enumerateInstanceNames(context(), path("Idle")); }), expected);
 }
 
-TEST_F(ManagerInstanceTest, ofAClassWithoutProviderNothingIsFound)
+TEST_F(ManagerInstanceTest, OfAClassWithoutProviderNothingIsFound)
 {
     EXPECT_EQ(refusalOf([&] { manager_.getInstance(context(), path("Idle"), nullptr); }),
         "code 6: there is no root/cimv2:Idle");
 }
 
-TEST_F(ManagerInstanceTest, anInstanceIsOfItsOwnClassOnly)
+TEST_F(ManagerInstanceTest, AnInstanceIsOfItsOwnClassOnly)
 {
     EXPECT_EQ(manager_.getInstance(context(), path("Part"), nullptr).className(), "Part");
     EXPECT_THAT(calls_, ElementsAre("Parts getInstance Part"));
@@ -72,14 +72,14 @@ TEST_F(ManagerInstanceTest, anInstanceIsOfItsOwnClassOnly)
         "code 6: there is no root/cimv2:Thing");
 }
 
-TEST_F(ManagerInstanceTest, anAnswerWithoutInstanceIsNotFound)
+TEST_F(ManagerInstanceTest, AnAnswerWithoutInstanceIsNotFound)
 {
     script("Boxes", [](const ProviderCall&) { return Ok; });
     EXPECT_EQ(refusalOf([&] { manager_.getInstance(context(), path("Box"), nullptr); }),
         "code 6: there is no root/cimv2:Box");
 }
 
-TEST_F(ManagerInstanceTest, theArgumentsArriveAsTheyAre)
+TEST_F(ManagerInstanceTest, TheArgumentsArriveAsTheyAre)
 {
     const char* properties[] = {"Name", nullptr};
     script("Boxes", [&](const ProviderCall& call) {
@@ -93,7 +93,7 @@ TEST_F(ManagerInstanceTest, theArgumentsArriveAsTheyAre)
     manager_.getInstance(context(), box, properties);
 }
 
-TEST_F(ManagerInstanceTest, aProviderMayChangeItsPathWithoutChangingTheCallers)
+TEST_F(ManagerInstanceTest, AProviderMayChangeItsPathWithoutChangingTheCallers)
 {
     script("Boxes", [&](const ProviderCall& call) {
         CMSetNameSpace(call.path, "elsewhere");
@@ -104,7 +104,7 @@ TEST_F(ManagerInstanceTest, aProviderMayChangeItsPathWithoutChangingTheCallers)
     EXPECT_EQ(box.nameSpace(), Testing::NameSpace);
 }
 
-TEST_F(ManagerInstanceTest, aProvidersErrorIsPassedOn)
+TEST_F(ManagerInstanceTest, AProvidersErrorIsPassedOn)
 {
     script("Boxes", [&](const ProviderCall& call) {
         answer(call);
@@ -114,14 +114,14 @@ TEST_F(ManagerInstanceTest, aProvidersErrorIsPassedOn)
         "code 2: not today");
 }
 
-TEST_F(ManagerInstanceTest, anErrorWithoutMessageNamesTheProvider)
+TEST_F(ManagerInstanceTest, AnErrorWithoutMessageNamesTheProvider)
 {
     script("Boxes", [](const ProviderCall&) { return CMPIStatus{CMPI_RC_ERR_FAILED, nullptr}; });
     EXPECT_EQ(refusalOf([&] { manager_.getInstance(context(), path("Box"), nullptr); }),
         "code 1: Boxes answers code 1");
 }
 
-TEST_F(ManagerInstanceTest, whatAProviderDoesNotSupportIsSaid)
+TEST_F(ManagerInstanceTest, WhatAProviderDoesNotSupportIsSaid)
 {
     script("Boxes", [](const ProviderCall&) {
         return CMPIStatus{CMPI_RC_ERR_NOT_SUPPORTED, nullptr};
@@ -137,7 +137,7 @@ TEST_F(ManagerInstanceTest, whatAProviderDoesNotSupportIsSaid)
         what("enumerating instance names"));
 }
 
-TEST_F(ManagerInstanceTest, anExceptionOfAProviderIsAFailure)
+TEST_F(ManagerInstanceTest, AnExceptionOfAProviderIsAFailure)
 {
     script("Boxes",
         [](const ProviderCall&) -> CMPIStatus { throw std::runtime_error("out of boxes"); });
@@ -145,7 +145,7 @@ TEST_F(ManagerInstanceTest, anExceptionOfAProviderIsAFailure)
         "code 1: Boxes: out of boxes");
 }
 
-TEST_F(ManagerInstanceTest, whatIsNoObjectIsRefusedAndCounted)
+TEST_F(ManagerInstanceTest, WhatIsNoObjectIsRefusedAndCounted)
 {
     script("Boxes", [](const ProviderCall& call) {
         EXPECT_NE(CMReturnInstance(call.result, nullptr).rc, CMPI_RC_OK);
@@ -157,7 +157,7 @@ TEST_F(ManagerInstanceTest, whatIsNoObjectIsRefusedAndCounted)
 
 // ---- Several providers ----
 
-TEST_F(ManagerInstanceTest, whatOneProviderFailsToAnswerTakesNothingFromTheOthers)
+TEST_F(ManagerInstanceTest, WhatOneProviderFailsToAnswerTakesNothingFromTheOthers)
 {
     script("Boxes", [&](const ProviderCall& call) {
         answer(call);
@@ -167,7 +167,7 @@ TEST_F(ManagerInstanceTest, whatOneProviderFailsToAnswerTakesNothingFromTheOther
     EXPECT_THAT(delivered(found), ElementsAre("Part", "SpecialPart"));
 }
 
-TEST_F(ManagerInstanceTest, whereNothingAtAllIsFoundTheFirstFailureIsTheAnswer)
+TEST_F(ManagerInstanceTest, WhereNothingAtAllIsFoundTheFirstFailureIsTheAnswer)
 {
     script("Boxes", [](const ProviderCall&) { return Ok; });
     script("Parts", [&](const ProviderCall&) { return failure(CMPI_RC_ERR_FAILED, "first"); });

@@ -48,7 +48,7 @@ protected:
     }
 };
 
-TEST_F(ManagerThreadsTest, everyRequestGetsItsWholeAnswer)
+TEST_F(ManagerThreadsTest, EveryRequestGetsItsWholeAnswer)
 {
     std::atomic<int> wrong = 0;
     onThreads([&] {

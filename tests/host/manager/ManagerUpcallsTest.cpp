@@ -38,7 +38,7 @@ protected:
     }
 };
 
-TEST_F(ManagerUpcallsTest, whatAProviderFindsCanBeHandedOver)
+TEST_F(ManagerUpcallsTest, WhatAProviderFindsCanBeHandedOver)
 {
     script("Boxes", [this](const ProviderCall& call) {
         CMPIStatus status = Ok;
@@ -53,7 +53,7 @@ TEST_F(ManagerUpcallsTest, whatAProviderFindsCanBeHandedOver)
                     "SpecialParts enumerateInstanceNames SpecialPart"));
 }
 
-TEST_F(ManagerUpcallsTest, instancesAreFoundToo)
+TEST_F(ManagerUpcallsTest, InstancesAreFoundToo)
 {
     script("Boxes", [this](const ProviderCall& call) {
         CMPIStatus status = Ok;
@@ -65,7 +65,7 @@ TEST_F(ManagerUpcallsTest, instancesAreFoundToo)
     EXPECT_THAT(delivered(found), ElementsAre("Part", "SpecialPart"));
 }
 
-TEST_F(ManagerUpcallsTest, theContextIsTheCallersAllTheWayDown)
+TEST_F(ManagerUpcallsTest, TheContextIsTheCallersAllTheWayDown)
 {
     const CMPIContext* seen = nullptr;
     script("Boxes", [this](const ProviderCall& call) {
@@ -80,7 +80,7 @@ TEST_F(ManagerUpcallsTest, theContextIsTheCallersAllTheWayDown)
     EXPECT_EQ(seen, context().handle());
 }
 
-TEST_F(ManagerUpcallsTest, anErrorReachesTheCallerWithItsMessage)
+TEST_F(ManagerUpcallsTest, AnErrorReachesTheCallerWithItsMessage)
 {
     script("SpecialParts",
         [&](const ProviderCall&) { return failure(CMPI_RC_ERR_ACCESS_DENIED, "not for you"); });
@@ -94,7 +94,7 @@ TEST_F(ManagerUpcallsTest, anErrorReachesTheCallerWithItsMessage)
         "code 2: not for you");
 }
 
-TEST_F(ManagerUpcallsTest, unknownAndUnservedClassesAreToldApart)
+TEST_F(ManagerUpcallsTest, UnknownAndUnservedClassesAreToldApart)
 {
     script("Boxes", [this](const ProviderCall& call) {
         CMPIStatus status = Ok;
@@ -107,7 +107,7 @@ TEST_F(ManagerUpcallsTest, unknownAndUnservedClassesAreToldApart)
     manager_.getInstance(context(), path("Box"), nullptr);
 }
 
-TEST_F(ManagerUpcallsTest, aCircleEndsInAnError)
+TEST_F(ManagerUpcallsTest, ACircleEndsInAnError)
 {
     script("Boxes", [this](const ProviderCall& call) {
         CMPIStatus status = Ok;
@@ -129,7 +129,7 @@ TEST_F(ManagerUpcallsTest, aCircleEndsInAnError)
     }
 }
 
-TEST_F(ManagerUpcallsTest, withoutARequestOnTheThreadThereIsNoAnswer)
+TEST_F(ManagerUpcallsTest, WithoutARequestOnTheThreadThereIsNoAnswer)
 {
     Host::Context& borrowed = request_->context();
     std::thread([&] {

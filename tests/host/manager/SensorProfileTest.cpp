@@ -48,7 +48,7 @@ protected:
     const std::unique_ptr<const Host::Repository> classes_ = Testing::shippedClasses();
 };
 
-TEST_F(SensorProfileTest, everyClassIsServed)
+TEST_F(SensorProfileTest, EveryClassIsServed)
 {
     Host::Manager manager(*classes_, Host::sensorProfileProviders(sensorLibrary, systemLibrary));
     EXPECT_EQ(count(manager, "ZUMLO_NumericSensor"), 2U);
@@ -60,7 +60,7 @@ TEST_F(SensorProfileTest, everyClassIsServed)
     EXPECT_EQ(count(manager, "CIM_Component"), 2U);
 }
 
-TEST_F(SensorProfileTest, everyObjectsOwnPathFindsIt)
+TEST_F(SensorProfileTest, EveryObjectsOwnPathFindsIt)
 {
     Host::Manager manager(*classes_, Host::sensorProfileProviders(sensorLibrary, systemLibrary));
     Host::Request request(manager.broker());
@@ -76,7 +76,7 @@ TEST_F(SensorProfileTest, everyObjectsOwnPathFindsIt)
     }
 }
 
-TEST_F(SensorProfileTest, theSystemLeadsToItsSensorsAndBack)
+TEST_F(SensorProfileTest, TheSystemLeadsToItsSensorsAndBack)
 {
     Host::Manager manager(*classes_, Host::sensorProfileProviders(sensorLibrary, systemLibrary));
     Host::Request request(manager.broker());
@@ -92,14 +92,14 @@ TEST_F(SensorProfileTest, theSystemLeadsToItsSensorsAndBack)
     EXPECT_EQ(back.paths()[0]->className(), "ZUMLO_ComputerSystem");
 }
 
-TEST_F(SensorProfileTest, withoutTheCompanionSensorsAreStillServed)
+TEST_F(SensorProfileTest, WithoutTheCompanionSensorsAreStillServed)
 {
     Host::Manager manager(*classes_, Host::sensorProfileProviders(sensorLibrary, std::nullopt));
     EXPECT_EQ(count(manager, "ZUMLO_NumericSensor"), 2U);
     EXPECT_THROW(count(manager, "ZUMLO_ComputerSystem"), Host::Refusal);
 }
 
-TEST_F(SensorProfileTest, aMissingLibraryIsAFailureThatNamesIt)
+TEST_F(SensorProfileTest, AMissingLibraryIsAFailureThatNamesIt)
 {
     try {
         const Host::Manager manager(
@@ -110,7 +110,7 @@ TEST_F(SensorProfileTest, aMissingLibraryIsAFailureThatNamesIt)
     }
 }
 
-TEST_F(SensorProfileTest, eightThreadsWalkAtOnce)
+TEST_F(SensorProfileTest, EightThreadsWalkAtOnce)
 {
     Host::Manager manager(*classes_, Host::sensorProfileProviders(sensorLibrary, systemLibrary));
     std::vector<std::thread> threads;

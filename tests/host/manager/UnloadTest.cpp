@@ -87,7 +87,7 @@ std::size_t openDescriptors()
     return static_cast<std::size_t>(std::distance(begin(descriptors), end(descriptors)));
 }
 
-class Unload : public testing::Test {
+class UnloadTest : public testing::Test {
 protected:
     // Uses the provider over and over on the machine that the setting names.
     void useManyTimes(const std::string& instrumentation, std::size_t sensors)
@@ -130,7 +130,7 @@ private:
     }
 };
 
-TEST_F(Unload, ProviderLeavesMemoryAfterOneUse)
+TEST_F(UnloadTest, ProviderLeavesMemoryAfterOneUse)
 {
     const Testing::EnvironmentVariable machine(
         "VORN_INSTRUMENTATION", "model:" + folder_.write("model.json", model));
@@ -140,13 +140,13 @@ TEST_F(Unload, ProviderLeavesMemoryAfterOneUse)
     EXPECT_FALSE(isLoaded());
 }
 
-TEST_F(Unload, ThousandUsesOnAModelLeaveNothingBehind)
+TEST_F(UnloadTest, ThousandUsesOnAModelLeaveNothingBehind)
 {
     useManyTimes("model:" + folder_.write("model.json", model), 3);
 }
 
 // Together with the machine's own sensors, of which there may be none.
-TEST_F(Unload, ThousandUsesOnThisMachineLeaveNothingBehind)
+TEST_F(UnloadTest, ThousandUsesOnThisMachineLeaveNothingBehind)
 {
     std::size_t sensors = 0;
     {

@@ -36,7 +36,7 @@ protected:
     const std::string ofThing_ = classOf("ClassName", "Thing");
 };
 
-TEST_F(DispatcherFaultTest, aProvidersCodeAndTextAreTheAnswer)
+TEST_F(DispatcherFaultTest, AProvidersCodeAndTextAreTheAnswer)
 {
     EXPECT_EQ(errorOfProvider(CMPI_RC_ERR_FAILED, "no luck"), "1: no luck");
     EXPECT_EQ(errorOfProvider(CMPI_RC_ERR_ACCESS_DENIED, "a < b & \"c\""),
@@ -45,14 +45,14 @@ TEST_F(DispatcherFaultTest, aProvidersCodeAndTextAreTheAnswer)
     EXPECT_EQ(errorOfProvider(CMPI_RC_ERR_QUERY_FEATURE_NOT_SUPPORTED, "last"), "29: last");
 }
 
-TEST_F(DispatcherFaultTest, codesThatTheProtocolDoesNotHaveAreFailures)
+TEST_F(DispatcherFaultTest, CodesThatTheProtocolDoesNotHaveAreFailures)
 {
     for (const CMPIrc code : {CMPI_RC_NO_MORE_ELEMENTS, CMPI_RC_DO_NOT_UNLOAD,
              CMPI_RC_ERR_INVALID_HANDLE, CMPI_RC_ERROR_SYSTEM, CMPI_RC_ERROR})
         EXPECT_EQ(errorOfProvider(code, "odd"), "1: odd");
 }
 
-TEST_F(DispatcherFaultTest, afterAFailureNothingIsLeftOfWhatWasDelivered)
+TEST_F(DispatcherFaultTest, AfterAFailureNothingIsLeftOfWhatWasDelivered)
 {
     manager_.script("Things", [this](const ProviderCall& asked) {
         for (int count = 0; count < 100; ++count)
@@ -67,7 +67,7 @@ TEST_F(DispatcherFaultTest, afterAFailureNothingIsLeftOfWhatWasDelivered)
     }
 }
 
-TEST_F(DispatcherFaultTest, anAnswerThatLacksObjectsIsNone)
+TEST_F(DispatcherFaultTest, AnAnswerThatLacksObjectsIsNone)
 {
     manager_.script("Things", [this](const ProviderCall& asked) {
         manager_.deliver(asked, "Thing", "a");
@@ -79,7 +79,7 @@ TEST_F(DispatcherFaultTest, anAnswerThatLacksObjectsIsNone)
         "1: the provider could not build 2 of the objects");
 }
 
-TEST_F(DispatcherFaultTest, aProviderThatThrowsIsAFailure)
+TEST_F(DispatcherFaultTest, AProviderThatThrowsIsAFailure)
 {
     manager_.script(
         "Things", [](const ProviderCall&) -> CMPIStatus { throw std::runtime_error("ouch"); });
@@ -99,7 +99,7 @@ TEST_F(DispatcherFaultTest, NothingIsReadOfOperationsThatChangeSomethingOrQuery)
             "7: operation &quot;" + operation + "&quot; is not offered");
 }
 
-TEST_F(DispatcherFaultTest, aMethodOfAClassIsNotSupported)
+TEST_F(DispatcherFaultTest, AMethodOfAClassIsNotSupported)
 {
     EXPECT_EQ(errorIn(answerTo(*manager_,
                   CimXmlTests::withHead(
@@ -109,7 +109,7 @@ TEST_F(DispatcherFaultTest, aMethodOfAClassIsNotSupported)
         "7: class Thing offers no method Reset");
 }
 
-TEST_F(DispatcherFaultTest, anElementThatLacksSomethingIsNoAnswer)
+TEST_F(DispatcherFaultTest, AnElementThatLacksSomethingIsNoAnswer)
 {
     EXPECT_THROW(ask("GetInstance", parameter("InstanceName", "<INSTANCENAME/>")),
         Host::CimXml::RequestError);

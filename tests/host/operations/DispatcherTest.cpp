@@ -71,7 +71,7 @@ protected:
     const std::string ofThing_ = classOf("ClassName", "Thing");
 };
 
-TEST_F(DispatcherTest, providersLearnWhoAsksForWhatNamespaceInWhichLanguage)
+TEST_F(DispatcherTest, ProvidersLearnWhoAsksForWhatNamespaceInWhichLanguage)
 {
     onThings([](const ProviderCall& asked) {
         EXPECT_EQ(entry(asked, CMPIPrincipal), "somebody");
@@ -82,7 +82,7 @@ TEST_F(DispatcherTest, providersLearnWhoAsksForWhatNamespaceInWhichLanguage)
     EXPECT_EQ(calls_, 1);
 }
 
-TEST_F(DispatcherTest, whatIsNotKnownOfTheCallerIsLeftOut)
+TEST_F(DispatcherTest, WhatIsNotKnownOfTheCallerIsLeftOut)
 {
     onThings([](const ProviderCall& asked) {
         EXPECT_EQ(entry(asked, CMPIPrincipal), "none");
@@ -92,7 +92,7 @@ TEST_F(DispatcherTest, whatIsNotKnownOfTheCallerIsLeftOut)
     EXPECT_EQ(calls_, 1);
 }
 
-TEST_F(DispatcherTest, flagsAreThoseOfTheOperationWithoutLocalOnly)
+TEST_F(DispatcherTest, FlagsAreThoseOfTheOperationWithoutLocalOnly)
 {
     std::vector<unsigned> seen;
     onThings([&seen](const ProviderCall& asked) { seen.push_back(flags(asked)); });
@@ -107,7 +107,7 @@ TEST_F(DispatcherTest, flagsAreThoseOfTheOperationWithoutLocalOnly)
             0U));
 }
 
-TEST_F(DispatcherTest, propertyListsArriveSpelledAsDeclaredAndWithoutWhatSaysNothing)
+TEST_F(DispatcherTest, PropertyListsArriveSpelledAsDeclaredAndWithoutWhatSaysNothing)
 {
     std::vector<std::vector<std::string>> seen;
     onThings([&seen](const ProviderCall& asked) { seen.push_back(listed(asked.properties)); });
@@ -121,7 +121,7 @@ TEST_F(DispatcherTest, propertyListsArriveSpelledAsDeclaredAndWithoutWhatSaysNot
                           ElementsAre("Unheard"), ElementsAre("IsOn")));
 }
 
-TEST_F(DispatcherTest, withoutDeepInheritanceTheListEndsWithTheClass)
+TEST_F(DispatcherTest, WithoutDeepInheritanceTheListEndsWithTheClass)
 {
     std::vector<std::vector<std::string>> seen;
     onThings([&seen](const ProviderCall& asked) { seen.push_back(listed(asked.properties)); });
@@ -134,7 +134,7 @@ TEST_F(DispatcherTest, withoutDeepInheritanceTheListEndsWithTheClass)
             ElementsAre("Label"), ElementsAre()));
 }
 
-TEST_F(DispatcherTest, aClassWithoutSubclassesLeavesNothingOut)
+TEST_F(DispatcherTest, AClassWithoutSubclassesLeavesNothingOut)
 {
     manager_.script("Gauges", [this](const ProviderCall& asked) {
         EXPECT_EQ(asked.properties, nullptr);
@@ -145,7 +145,7 @@ TEST_F(DispatcherTest, aClassWithoutSubclassesLeavesNothingOut)
     EXPECT_EQ(calls_, 1);
 }
 
-TEST_F(DispatcherTest, theFiltersOfAssociationsArrive)
+TEST_F(DispatcherTest, TheFiltersOfAssociationsArrive)
 {
     manager_.script("Links", [this](const ProviderCall& asked) {
         EXPECT_STREQ(asked.role, "Owner");
@@ -171,7 +171,7 @@ TEST_F(DispatcherTest, theFiltersOfAssociationsArrive)
     EXPECT_EQ(calls_, 8);
 }
 
-TEST_F(DispatcherTest, aPathWithoutHostGetsTheManagersAndItsNamespace)
+TEST_F(DispatcherTest, APathWithoutHostGetsTheManagersAndItsNamespace)
 {
     manager_.deliverThings(1);
     const std::string answer =
@@ -181,7 +181,7 @@ TEST_F(DispatcherTest, aPathWithoutHostGetsTheManagersAndItsNamespace)
                                   "<NAMESPACE NAME=\"test\"></NAMESPACE>"));
 }
 
-TEST_F(DispatcherTest, thePathsHostIsNamedAsItIsNow)
+TEST_F(DispatcherTest, ThePathsHostIsNamedAsItIsNow)
 {
     manager_.deliverThings(1);
     manager_.renameHost("renamed.example");

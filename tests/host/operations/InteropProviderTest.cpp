@@ -60,7 +60,7 @@ protected:
     Host::Request request_{manager_.broker()};
 };
 
-TEST_F(InteropProviderTest, aListLeavesOutAllButTheKeysAndWhatItNames)
+TEST_F(InteropProviderTest, AListLeavesOutAllButTheKeysAndWhatItNames)
 {
     const char* list[] = {"registeredname", "Unheard", nullptr};
     EXPECT_THAT(profile(list), ElementsAre("InstanceID", "RegisteredName"));
@@ -68,7 +68,7 @@ TEST_F(InteropProviderTest, aListLeavesOutAllButTheKeysAndWhatItNames)
     EXPECT_THAT(profile(nothing), ElementsAre("InstanceID"));
 }
 
-TEST_F(InteropProviderTest, whatOneAskedForLeavesTheObjectsAsTheyAre)
+TEST_F(InteropProviderTest, WhatOneAskedForLeavesTheObjectsAsTheyAre)
 {
     const char* nothing[] = {nullptr};
     profile(nothing);
@@ -77,7 +77,7 @@ TEST_F(InteropProviderTest, whatOneAskedForLeavesTheObjectsAsTheyAre)
             "RegisteredName", "RegisteredVersion", "AdvertiseTypes"));
 }
 
-TEST_F(InteropProviderTest, anObjectIsFoundByAllItsKeys)
+TEST_F(InteropProviderTest, AnObjectIsFoundByAllItsKeys)
 {
     EXPECT_TRUE(isFound(profilePath("INSTANCEID", "ZUMLO:DSP1009")));
     EXPECT_FALSE(isFound(profilePath("InstanceID", "zumlo:dsp1009")));
@@ -85,7 +85,7 @@ TEST_F(InteropProviderTest, anObjectIsFoundByAllItsKeys)
     EXPECT_FALSE(isFound(request_.makePath(Host::interopNameSpace, Host::namespaceClass)));
 }
 
-TEST_F(InteropProviderTest, thereIsOneNamespaceObjectForEachNamespace)
+TEST_F(InteropProviderTest, ThereIsOneNamespaceObjectForEachNamespace)
 {
     const auto answer = manager_.enumerateInstanceNames(
         request_.context(), request_.makePath(Host::interopNameSpace, Host::namespaceClass));
@@ -95,7 +95,7 @@ TEST_F(InteropProviderTest, thereIsOneNamespaceObjectForEachNamespace)
     EXPECT_THAT(names, ElementsAre("root/cimv2", "root/interop"));
 }
 
-TEST_F(InteropProviderTest, theSystemIsNamedAsItIsNow)
+TEST_F(InteropProviderTest, TheSystemIsNamedAsItIsNow)
 {
     const auto systemName = [&](const char* className) {
         const auto answer = manager_.enumerateInstances(
@@ -108,7 +108,7 @@ TEST_F(InteropProviderTest, theSystemIsNamedAsItIsNow)
     EXPECT_EQ(systemName(Host::namespaceClass), "renamed.example");
 }
 
-TEST_F(InteropProviderTest, everyPropertyIsDeclaredWithItsType)
+TEST_F(InteropProviderTest, EveryPropertyIsDeclaredWithItsType)
 {
     const auto answer = manager_.enumerateInstances(request_.context(),
         request_.makePath(Host::interopNameSpace, "CIM_ManagedElement"), nullptr);

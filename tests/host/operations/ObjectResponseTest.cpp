@@ -16,7 +16,7 @@ namespace {
 constexpr std::size_t portion = std::size_t{16} * 1024;
 constexpr std::size_t largestObject = 2048;
 
-TEST(ObjectResponseTest, manyObjectsComeInSmallPieces)
+TEST(ObjectResponseTest, ManyObjectsComeInSmallPieces)
 {
     ScriptedManager manager;
     manager.deliverThings(5000);
@@ -35,7 +35,7 @@ TEST(ObjectResponseTest, manyObjectsComeInSmallPieces)
     EXPECT_FALSE(answer->append(whole));
 }
 
-TEST(ObjectResponseTest, whatIsThereAlreadyStays)
+TEST(ObjectResponseTest, WhatIsThereAlreadyStays)
 {
     ScriptedManager manager;
     manager.deliverThings(1);
@@ -49,7 +49,7 @@ TEST(ObjectResponseTest, whatIsThereAlreadyStays)
     EXPECT_EQ(out, all);
 }
 
-TEST(ObjectResponseTest, aFailureComesInOnePieceOnce)
+TEST(ObjectResponseTest, AFailureComesInOnePieceOnce)
 {
     Host::WrittenResponse answer("whole");
     std::string out = "the ";
@@ -59,7 +59,7 @@ TEST(ObjectResponseTest, aFailureComesInOnePieceOnce)
     EXPECT_EQ(out, "the whole");
 }
 
-TEST(ObjectResponseTest, anotherThreadMayReadIt)
+TEST(ObjectResponseTest, AnotherThreadMayReadIt)
 {
     ScriptedManager manager;
     manager.deliverThings(1000);
@@ -76,7 +76,7 @@ TEST(ObjectResponseTest, anotherThreadMayReadIt)
     EXPECT_EQ(countOf(text, "<VALUE.NAMEDINSTANCE>"), 1000U);
 }
 
-TEST(ObjectResponseTest, itsObjectsGoWhenItWasReadOrWithIt)
+TEST(ObjectResponseTest, ItsObjectsGoWhenItWasReadOrWithIt)
 {
     const auto classes = Testing::compile(CimXmlTests::Classes);
     const Host::Broker broker;

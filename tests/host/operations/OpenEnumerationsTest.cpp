@@ -70,7 +70,7 @@ protected:
     Host::OpenEnumerations enumerations_{limits_, [this] { return now_; }};
 };
 
-TEST_F(OpenEnumerationsTest, objectsComeInOrderUntilThereAreNoMore)
+TEST_F(OpenEnumerationsTest, ObjectsComeInOrderUntilThereAreNoMore)
 {
     const std::string context = open(5);
     EXPECT_EQ(pull(context, 2), "01");
@@ -80,13 +80,13 @@ TEST_F(OpenEnumerationsTest, objectsComeInOrderUntilThereAreNoMore)
     EXPECT_FALSE(isOpen(context));
 }
 
-TEST_F(OpenEnumerationsTest, theLastObjectsEndItEvenWhenNoMoreWereWanted)
+TEST_F(OpenEnumerationsTest, TheLastObjectsEndItEvenWhenNoMoreWereWanted)
 {
     const std::string context = open(4);
     EXPECT_EQ(pull(context, 4), "0123.");
 }
 
-TEST_F(OpenEnumerationsTest, contextsAre128BitsAndNeverTheSame)
+TEST_F(OpenEnumerationsTest, ContextsAre128BitsAndNeverTheSame)
 {
     std::set<std::string> contexts;
     for (int i = 0; i < 1000; ++i) {
@@ -99,7 +99,7 @@ TEST_F(OpenEnumerationsTest, contextsAre128BitsAndNeverTheSame)
     EXPECT_EQ(contexts.size(), 1000U);
 }
 
-TEST_F(OpenEnumerationsTest, nobodyElseGetsAnything)
+TEST_F(OpenEnumerationsTest, NobodyElseGetsAnything)
 {
     const std::string context = open(5);
     for (const EnumerationOwner& other :
@@ -112,7 +112,7 @@ TEST_F(OpenEnumerationsTest, nobodyElseGetsAnything)
     EXPECT_EQ(pull(context, 5), "01234.");
 }
 
-TEST_F(OpenEnumerationsTest, pathsAreNotPulledFromInstances)
+TEST_F(OpenEnumerationsTest, PathsAreNotPulledFromInstances)
 {
     const std::string context = open(5);
     EXPECT_THAT(refusalOf([&] {
@@ -124,7 +124,7 @@ TEST_F(OpenEnumerationsTest, pathsAreNotPulledFromInstances)
     EXPECT_FALSE(isOpen(context));
 }
 
-TEST_F(OpenEnumerationsTest, whatIsClosedIsGone)
+TEST_F(OpenEnumerationsTest, WhatIsClosedIsGone)
 {
     const std::string context = open(5);
     enumerations_.close(context, Owner);
@@ -134,7 +134,7 @@ TEST_F(OpenEnumerationsTest, whatIsClosedIsGone)
     EXPECT_THAT(refusalOf([&] { enumerations_.close("", Owner); }), testing::StartsWith("21: "));
 }
 
-TEST_F(OpenEnumerationsTest, itsTimeBeginsAnewWithEachPull)
+TEST_F(OpenEnumerationsTest, ItsTimeBeginsAnewWithEachPull)
 {
     const std::string context = open(5, 10s);
     for (int i = 0; i < 3; ++i) {
@@ -145,7 +145,7 @@ TEST_F(OpenEnumerationsTest, itsTimeBeginsAnewWithEachPull)
     EXPECT_FALSE(isOpen(context));
 }
 
-TEST_F(OpenEnumerationsTest, thereAreNoMoreThanTheLimit)
+TEST_F(OpenEnumerationsTest, ThereAreNoMoreThanTheLimit)
 {
     open(1);
     open(1, 20s);
@@ -159,7 +159,7 @@ TEST_F(OpenEnumerationsTest, thereAreNoMoreThanTheLimit)
     EXPECT_THAT(refusalOf([&] { open(1); }), testing::StartsWith("27: "));
 }
 
-TEST_F(OpenEnumerationsTest, theyHoldNoMoreThanTheLimit)
+TEST_F(OpenEnumerationsTest, TheyHoldNoMoreThanTheLimit)
 {
     const std::string first = open(60);
     EXPECT_EQ(
@@ -174,7 +174,7 @@ TEST_F(OpenEnumerationsTest, theyHoldNoMoreThanTheLimit)
     open(40);
 }
 
-TEST_F(OpenEnumerationsTest, memoryStaysWithWhatWasPulled)
+TEST_F(OpenEnumerationsTest, MemoryStaysWithWhatWasPulled)
 {
     auto memory = std::make_shared<Host::Arena>();
     const std::weak_ptr<Host::Arena> watched = memory;
@@ -189,7 +189,7 @@ TEST_F(OpenEnumerationsTest, memoryStaysWithWhatWasPulled)
     EXPECT_TRUE(watched.expired());
 }
 
-TEST_F(OpenEnumerationsTest, memoryGoesWithTheTime)
+TEST_F(OpenEnumerationsTest, MemoryGoesWithTheTime)
 {
     auto memory = std::make_shared<Host::Arena>();
     const std::weak_ptr<Host::Arena> watched = memory;
@@ -204,7 +204,7 @@ TEST_F(OpenEnumerationsTest, memoryGoesWithTheTime)
     EXPECT_TRUE(watched.expired());
 }
 
-TEST(OpenEnumerationsThreads, eachObjectIsPulledOnce)
+TEST(OpenEnumerationsThreadsTest, EachObjectIsPulledOnce)
 {
     constexpr std::size_t count = 4000;
     Host::OpenEnumerations enumerations({.maximumOpenEnumerations = 1000});

@@ -55,7 +55,7 @@ protected:
     ShippedManager manager_;
 };
 
-TEST_F(OperationThreadsTest, everybodyGetsTheWholeAnswer)
+TEST_F(OperationThreadsTest, EverybodyGetsTheWholeAnswer)
 {
     const std::string enumeration = classOf("ClassName", "CIM_ManagedElement");
     const std::string instances = ask("EnumerateInstances", enumeration);
@@ -73,7 +73,7 @@ TEST_F(OperationThreadsTest, everybodyGetsTheWholeAnswer)
     EXPECT_EQ(wrong, 0);
 }
 
-TEST_F(OperationThreadsTest, pullsOfOneEnumerationShareItsObjects)
+TEST_F(OperationThreadsTest, PullsOfOneEnumerationShareItsObjects)
 {
     onThreads([this] {
         const std::string context =
@@ -90,7 +90,7 @@ TEST_F(OperationThreadsTest, pullsOfOneEnumerationShareItsObjects)
     });
 }
 
-TEST_F(OperationThreadsTest, classesAndTheManagerItselfAreAskedByAll)
+TEST_F(OperationThreadsTest, ClassesAndTheManagerItselfAreAskedByAll)
 {
     const auto classes = [this] {
         return ask("EnumerateClasses", valueOf("DeepInheritance", "TRUE"));

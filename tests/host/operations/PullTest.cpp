@@ -42,7 +42,7 @@ protected:
         {.maximumOpenEnumerations = 2, .maximumHeldObjects = 12, .maximumObjectCount = 3}};
 };
 
-TEST_F(PullTest, whatComesAtOnceStaysNotOpen)
+TEST_F(PullTest, WhatComesAtOnceStaysNotOpen)
 {
     manager_.deliverThings(2);
     for (int i = 0; i < 10; ++i) {
@@ -54,13 +54,13 @@ TEST_F(PullTest, whatComesAtOnceStaysNotOpen)
     }
 }
 
-TEST_F(PullTest, anEmptyEnumerationEndsWhenItIsOpened)
+TEST_F(PullTest, AnEmptyEnumerationEndsWhenItIsOpened)
 {
     manager_.deliverThings(0);
     EXPECT_TRUE(isEndOfSequence(open(0)));
 }
 
-TEST_F(PullTest, anAnswerHasNoMoreObjectsThanTheLimit)
+TEST_F(PullTest, AnAnswerHasNoMoreObjectsThanTheLimit)
 {
     const std::string first = open(100);
     EXPECT_EQ(countOf(first, InstanceElement), 3U);
@@ -70,7 +70,7 @@ TEST_F(PullTest, anAnswerHasNoMoreObjectsThanTheLimit)
     EXPECT_TRUE(isEndOfSequence(second));
 }
 
-TEST_F(PullTest, theSelectionIsThatOfTheOpening)
+TEST_F(PullTest, TheSelectionIsThatOfTheOpening)
 {
     const std::string first =
         open(1, parameter("PropertyList", "<VALUE.ARRAY><VALUE>Index</VALUE></VALUE.ARRAY>") +
@@ -82,7 +82,7 @@ TEST_F(PullTest, theSelectionIsThatOfTheOpening)
             "</PROPERTY>");
 }
 
-TEST_F(PullTest, onlyWhoOpenedItMayPull)
+TEST_F(PullTest, OnlyWhoOpenedItMayPull)
 {
     const std::string context = contextIn(open(0, {}, {"anna", "a", {}}));
     EXPECT_THAT(errorIn(pull(context, 1, {"bert", "a", {}})), StartsWith("21"));
@@ -91,7 +91,7 @@ TEST_F(PullTest, onlyWhoOpenedItMayPull)
     EXPECT_EQ(errorIn(pull(context, 1, {"anna", "b", {}})), "");
 }
 
-TEST_F(PullTest, itIsOpenAsLongAsWasAskedFor)
+TEST_F(PullTest, ItIsOpenAsLongAsWasAskedFor)
 {
     const std::string context = contextIn(open(0, valueOf("OperationTimeout", "600")));
     manager_.wait(599s);
@@ -100,7 +100,7 @@ TEST_F(PullTest, itIsOpenAsLongAsWasAskedFor)
     EXPECT_THAT(errorIn(pull(context, 0)), StartsWith("21"));
 }
 
-TEST_F(PullTest, withoutATimeItIsTheDefault)
+TEST_F(PullTest, WithoutATimeItIsTheDefault)
 {
     const std::string context = contextIn(open(0));
     manager_.wait(59s);
@@ -109,7 +109,7 @@ TEST_F(PullTest, withoutATimeItIsTheDefault)
     EXPECT_THAT(errorIn(pull(context, 0)), StartsWith("21"));
 }
 
-TEST_F(PullTest, anyOperationGivesBackTheMemoryWhenTheTimeIsOver)
+TEST_F(PullTest, AnyOperationGivesBackTheMemoryWhenTheTimeIsOver)
 {
     const std::size_t before = memory_.taken();
     open(0);
@@ -122,7 +122,7 @@ TEST_F(PullTest, anyOperationGivesBackTheMemoryWhenTheTimeIsOver)
     EXPECT_EQ(memory_.taken(), before);
 }
 
-TEST_F(PullTest, badTimesAreRefusedBeforeAnythingIsEnumerated)
+TEST_F(PullTest, BadTimesAreRefusedBeforeAnythingIsEnumerated)
 {
     manager_.script("Things", [](const ProviderCall&) {
         ADD_FAILURE() << "was asked";
@@ -136,7 +136,7 @@ TEST_F(PullTest, badTimesAreRefusedBeforeAnythingIsEnumerated)
     EXPECT_THAT(errorIn(open(0, valueOf("ContinueOnError", "TRUE"))), StartsWith("26"));
 }
 
-TEST_F(PullTest, tooManyAreRefused)
+TEST_F(PullTest, TooManyAreRefused)
 {
     const std::string context = contextIn(open(1));
     EXPECT_EQ(errorIn(open(1)), "");
@@ -145,13 +145,13 @@ TEST_F(PullTest, tooManyAreRefused)
     EXPECT_EQ(errorIn(open(1)), "");
 }
 
-TEST_F(PullTest, tooLargeOnesAreRefused)
+TEST_F(PullTest, TooLargeOnesAreRefused)
 {
     manager_.deliverThings(13);
     EXPECT_EQ(errorIn(open(1)), "27: open enumerations would hold more than 12 objects");
 }
 
-TEST_F(PullTest, whatWasPulledIsReadWhenTheRestIsGone)
+TEST_F(PullTest, WhatWasPulledIsReadWhenTheRestIsGone)
 {
     const std::string context = contextIn(open(1));
     const auto pulled = (*manager_).answer(

@@ -90,7 +90,7 @@ protected:
     std::set<std::string> tried_; // classes
 };
 
-TEST_F(RoundTripTest, pathsOfEnumerations)
+TEST_F(RoundTripTest, PathsOfEnumerations)
 {
     for (const char* const root :
         {"CIM_ManagedElement", "CIM_Component", "CIM_ElementCapabilities"}) {
@@ -104,7 +104,7 @@ TEST_F(RoundTripTest, pathsOfEnumerations)
     EXPECT_EQ(tried_.size(), 5U);
 }
 
-TEST_F(RoundTripTest, pathsOfWhatIsAssociated)
+TEST_F(RoundTripTest, PathsOfWhatIsAssociated)
 {
     for (const std::string& source :
         found("EnumerateInstanceNames", classOf("ClassName", "CIM_ManagedElement")))
@@ -112,7 +112,7 @@ TEST_F(RoundTripTest, pathsOfWhatIsAssociated)
     EXPECT_EQ(tried_.size(), 5U);
 }
 
-TEST_F(RoundTripTest, pathsThatArePulled)
+TEST_F(RoundTripTest, PathsThatArePulled)
 {
     const std::string opened = ask("OpenEnumerateInstances",
         classOf("ClassName", "CIM_ManagedElement") + valueOf("MaxObjectCount", "0"));
@@ -125,7 +125,7 @@ TEST_F(RoundTripTest, pathsThatArePulled)
         expectFound(name);
 }
 
-TEST_F(RoundTripTest, pathsOfTheObjectManagerItself)
+TEST_F(RoundTripTest, PathsOfTheObjectManagerItself)
 {
     nameSpace_ = "root/interop";
     const std::string whole = classOf("ClassName", "CIM_ManagedElement");

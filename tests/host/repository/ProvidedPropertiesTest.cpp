@@ -32,7 +32,7 @@ protected:
             SENSOR_PROFILE_BINARY_DIR "/lib/libComputerSystemProvider.so")};
 };
 
-TEST_P(ProvidedPropertiesTest, areDeclaredWithTheTypeTheyHave)
+TEST_P(ProvidedPropertiesTest, AreDeclaredWithTheTypeTheyHave)
 {
     const Host::ClassDeclaration& declared = *repository_->findClass(Cimv2, GetParam());
     Host::Request request(manager_.broker());
@@ -52,10 +52,11 @@ TEST_P(ProvidedPropertiesTest, areDeclaredWithTheTypeTheyHave)
     }
 }
 
-TEST_P(ProvidedPropertiesTest, keysOfPathsAreThoseOfTheClass)
+TEST_P(ProvidedPropertiesTest, KeysOfPathsAreThoseOfTheClass)
 {
     Host::Request request(manager_.broker());
-    const auto answer = manager_.enumerateInstanceNames(request.context(), request.makePath(Cimv2, GetParam()));
+    const auto answer =
+        manager_.enumerateInstanceNames(request.context(), request.makePath(Cimv2, GetParam()));
     ASSERT_FALSE(answer.paths().empty());
     for (const Host::ObjectPath* const path : answer.paths()) {
         std::vector<std::string> keys;

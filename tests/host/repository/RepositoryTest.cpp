@@ -36,7 +36,7 @@ protected:
         [Association] class Link { [Key] Top ref One; [Key] Other ref Two; string Note; };)");
 };
 
-TEST_F(RepositoryTest, findsClassesInAnyCaseAndSpellsThemAsDeclared)
+TEST_F(RepositoryTest, FindsClassesInAnyCaseAndSpellsThemAsDeclared)
 {
     EXPECT_EQ(repository_->findClass("ROOT/TEST", "LEFTone")->name, "LeftOne");
     EXPECT_EQ(repository_->findClass("/root/test/", "LeftOne")->name, "LeftOne");
@@ -49,7 +49,7 @@ TEST_F(RepositoryTest, findsClassesInAnyCaseAndSpellsThemAsDeclared)
     EXPECT_EQ(repository_->findNamespace(NameSpace)->qualifiers().front()->name, "Abstract");
 }
 
-TEST_F(RepositoryTest, listsSubclassesDirectAndDeep)
+TEST_F(RepositoryTest, ListsSubclassesDirectAndDeep)
 {
     EXPECT_THAT(names(repository_->subclasses(NameSpace, "top", Depth::direct)),
         ElementsAre("Left", "Right"));
@@ -60,7 +60,7 @@ TEST_F(RepositoryTest, listsSubclassesDirectAndDeep)
     EXPECT_THAT(repository_->subclasses("root", "Top", Depth::deep), IsEmpty());
 }
 
-TEST_F(RepositoryTest, listsTheRootsForNoClass)
+TEST_F(RepositoryTest, ListsTheRootsForNoClass)
 {
     EXPECT_THAT(names(repository_->subclasses(NameSpace, "", Depth::direct)),
         ElementsAre("Top", "Other", "Link"));
@@ -69,7 +69,7 @@ TEST_F(RepositoryTest, listsTheRootsForNoClass)
     EXPECT_THAT(repository_->subclasses("root", "", Depth::deep), IsEmpty());
 }
 
-TEST_F(RepositoryTest, tellsDescentAtAnyDistance)
+TEST_F(RepositoryTest, TellsDescentAtAnyDistance)
 {
     EXPECT_TRUE(repository_->isDerivedFrom(NameSpace, "LeftOne", "TOP"));
     EXPECT_TRUE(repository_->isDerivedFrom(NameSpace, "LeftOne", "Left"));
@@ -79,7 +79,7 @@ TEST_F(RepositoryTest, tellsDescentAtAnyDistance)
     EXPECT_FALSE(repository_->isDerivedFrom("root", "Left", "Top"));
 }
 
-TEST_F(RepositoryTest, classesTellDescentFromOneAnother)
+TEST_F(RepositoryTest, ClassesTellDescentFromOneAnother)
 {
     const auto& left = Testing::classNamed(*repository_, "Left");
     EXPECT_TRUE(Testing::classNamed(*repository_, "LeftOne").isDerivedFrom(left));
@@ -87,7 +87,7 @@ TEST_F(RepositoryTest, classesTellDescentFromOneAnother)
     EXPECT_FALSE(Testing::classNamed(*repository_, "Right").isDerivedFrom(left));
 }
 
-TEST_F(RepositoryTest, listsReferencesOfAssociationsOnly)
+TEST_F(RepositoryTest, ListsReferencesOfAssociationsOnly)
 {
     const auto references = repository_->referencesOf(NameSpace, "LINK");
     ASSERT_EQ(references.size(), 2U);
@@ -98,7 +98,7 @@ TEST_F(RepositoryTest, listsReferencesOfAssociationsOnly)
     EXPECT_THAT(repository_->referencesOf(NameSpace, "None"), IsEmpty());
 }
 
-TEST_F(RepositoryTest, keysAreTheSameListAtEveryRequest)
+TEST_F(RepositoryTest, KeysAreTheSameListAtEveryRequest)
 {
     const auto* const keys = repository_->keysOf(NameSpace, "Right");
     ASSERT_NE(keys, nullptr);
@@ -107,7 +107,7 @@ TEST_F(RepositoryTest, keysAreTheSameListAtEveryRequest)
     EXPECT_EQ(repository_->keysOf("root", "Right"), nullptr);
 }
 
-TEST_F(RepositoryTest, answersManyThreadsAtOnce)
+TEST_F(RepositoryTest, AnswersManyThreadsAtOnce)
 {
     std::atomic<int> right = 0;
     std::vector<std::thread> threads;

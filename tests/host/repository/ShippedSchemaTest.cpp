@@ -52,7 +52,7 @@ protected:
     std::unique_ptr<const Host::Repository> repository_ = compileAll();
 };
 
-TEST_F(ShippedSchemaTest, sensorsAreNumericSensors)
+TEST_F(ShippedSchemaTest, SensorsAreNumericSensors)
 {
     EXPECT_THAT(ancestors("ZUMLO_NumericSensor"),
         ElementsAre("CIM_NumericSensor", "CIM_Sensor", "CIM_LogicalDevice",
@@ -62,7 +62,7 @@ TEST_F(ShippedSchemaTest, sensorsAreNumericSensors)
         ElementsAre("SystemCreationClassName", "SystemName", "CreationClassName", "DeviceID"));
 }
 
-TEST_F(ShippedSchemaTest, capabilitiesAreNamedByAnInstanceId)
+TEST_F(ShippedSchemaTest, CapabilitiesAreNamedByAnInstanceId)
 {
     EXPECT_THAT(ancestors("ZUMLO_SensorEnabledLogicalElementCapabilities"),
         ElementsAre(
@@ -70,7 +70,7 @@ TEST_F(ShippedSchemaTest, capabilitiesAreNamedByAnInstanceId)
     EXPECT_THAT(keys("ZUMLO_SensorEnabledLogicalElementCapabilities"), ElementsAre("InstanceID"));
 }
 
-TEST_F(ShippedSchemaTest, theComputerSystemIsNamedByClassAndName)
+TEST_F(ShippedSchemaTest, TheComputerSystemIsNamedByClassAndName)
 {
     EXPECT_THAT(ancestors("ZUMLO_ComputerSystem"),
         ElementsAre("CIM_ComputerSystem", "CIM_System", "CIM_EnabledLogicalElement",
@@ -78,7 +78,7 @@ TEST_F(ShippedSchemaTest, theComputerSystemIsNamedByClassAndName)
     EXPECT_THAT(keys("ZUMLO_ComputerSystem"), ElementsAre("CreationClassName", "Name"));
 }
 
-TEST_F(ShippedSchemaTest, associationsAreKeyedByTheirReferences)
+TEST_F(ShippedSchemaTest, AssociationsAreKeyedByTheirReferences)
 {
     EXPECT_THAT(
         ancestors("ZUMLO_SensorElementCapabilities"), ElementsAre("CIM_ElementCapabilities"));
@@ -97,7 +97,7 @@ TEST_F(ShippedSchemaTest, associationsAreKeyedByTheirReferences)
     EXPECT_FALSE(repository_->findClass(Cimv2, "ZUMLO_NumericSensor")->isAssociation);
 }
 
-TEST_F(ShippedSchemaTest, interopDescribesTheObjectManager)
+TEST_F(ShippedSchemaTest, InteropDescribesTheObjectManager)
 {
     EXPECT_THAT(keys("CIM_Namespace", Interop),
         ElementsAre("SystemCreationClassName", "SystemName", "ObjectManagerCreationClassName",
@@ -111,7 +111,7 @@ TEST_F(ShippedSchemaTest, interopDescribesTheObjectManager)
 }
 
 // As other object managers get it: on top of what they have, one file after the other.
-TEST_F(ShippedSchemaTest, theFilesCompileOneByOneToo)
+TEST_F(ShippedSchemaTest, TheFilesCompileOneByOneToo)
 {
     Host::Compiler compiler;
     compiler.compileFile(Folder / "qualifiers.mof", Cimv2);
@@ -123,7 +123,7 @@ TEST_F(ShippedSchemaTest, theFilesCompileOneByOneToo)
 }
 
 // As the operations page tells to make one file of those that an object manager may lack.
-TEST_F(ShippedSchemaTest, theAncestorsCompileAsOneFile)
+TEST_F(ShippedSchemaTest, TheAncestorsCompileAsOneFile)
 {
     std::string all;
     for (const char* const name : {"qualifiers.mof", "cim-core.mof", "cim-ancestors.mof"}) {
@@ -141,7 +141,7 @@ TEST_F(ShippedSchemaTest, theAncestorsCompileAsOneFile)
     EXPECT_NE(repository->findClass(Cimv2, "ZUMLO_SensorSystemDevice"), nullptr);
 }
 
-TEST_F(ShippedSchemaTest, everyElementIsDescribed)
+TEST_F(ShippedSchemaTest, EveryElementIsDescribed)
 {
     for (const auto& nameSpace : repository_->namespaces())
         for (const auto& declared : nameSpace->classes()) {
@@ -153,7 +153,7 @@ TEST_F(ShippedSchemaTest, everyElementIsDescribed)
         }
 }
 
-TEST_F(ShippedSchemaTest, everyMappedValueHasItsText)
+TEST_F(ShippedSchemaTest, EveryMappedValueHasItsText)
 {
     int maps = 0;
     for (const auto& nameSpace : repository_->namespaces())
@@ -172,7 +172,7 @@ TEST_F(ShippedSchemaTest, everyMappedValueHasItsText)
     EXPECT_GT(maps, 0);
 }
 
-TEST_F(ShippedSchemaTest, mappedPropertiesExist)
+TEST_F(ShippedSchemaTest, MappedPropertiesExist)
 {
     for (const auto& nameSpace : repository_->namespaces())
         for (const auto& declared : nameSpace->classes())

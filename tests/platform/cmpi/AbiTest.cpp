@@ -14,7 +14,7 @@
 
 namespace {
 
-TEST(CmpiAbi, everyMemberStandsAtItsOffset)
+TEST(CmpiAbiTest, EveryMemberStandsAtItsOffset)
 {
 #define MEMBER(structure, member, offset, ...)                                                     \
     EXPECT_EQ(offsetof(structure, member), std::size_t{offset}) << #structure "::" #member;
@@ -24,7 +24,7 @@ TEST(CmpiAbi, everyMemberStandsAtItsOffset)
 
 // An installed header set may spell a handle's constness differently; ours must be exact.
 #ifdef SENSOR_PROFILE_OWN_CMPI_HEADERS
-TEST(CmpiAbi, everyMemberHasItsType)
+TEST(CmpiAbiTest, EveryMemberHasItsType)
 {
 #define MEMBER(structure, member, offset, ...)                                                     \
     static_assert(                                                                                 \
@@ -34,14 +34,14 @@ TEST(CmpiAbi, everyMemberHasItsType)
 }
 #endif
 
-TEST(CmpiAbi, everyStructureHasItsSize)
+TEST(CmpiAbiTest, EveryStructureHasItsSize)
 {
 #define SIZE(structure, bytes) EXPECT_EQ(sizeof(structure), std::size_t{bytes}) << #structure;
 #include "sizes.inc"
 #undef SIZE
 }
 
-TEST(CmpiAbi, everyConstantHasItsValue)
+TEST(CmpiAbiTest, EveryConstantHasItsValue)
 {
 #define NUMBER(name, value) EXPECT_EQ(static_cast<long>(name), value##L) << #name;
 #define TEXT(name, value) EXPECT_STREQ(name, value);
@@ -50,7 +50,7 @@ TEST(CmpiAbi, everyConstantHasItsValue)
 #undef TEXT
 }
 
-TEST(CmpiAbi, theWidthsOfPlainValuesAreTheirNames)
+TEST(CmpiAbiTest, TheWidthsOfPlainValuesAreTheirNames)
 {
     EXPECT_EQ(sizeof(CMPIBoolean), 1U);
     EXPECT_EQ(sizeof(CMPIChar16), 2U);

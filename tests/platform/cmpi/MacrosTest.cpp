@@ -70,7 +70,7 @@ CMPIStatus LampExecQuery(CMPIInstanceMI*, const CMPIContext*, const CMPIResult*,
 
 CMInstanceMIStub(Lamp, LampProvider, theBroker, ++hookCalls)
 
-    TEST(CmpiStub, theInstanceFactoryFillsEverySlotInOrder)
+    TEST(CmpiStubTest, TheInstanceFactoryFillsEverySlotInOrder)
 {
     const CMPIBroker broker = {};
     CMPIStatus status = {CMPI_RC_ERR_FAILED, nullptr};
@@ -100,7 +100,7 @@ struct Call {
 };
 Call lastCall;
 
-TEST(CmpiMacros, aPropertyValueIsHandedOnByAddress)
+TEST(CmpiMacrosTest, APropertyValueIsHandedOnByAddress)
 {
     CMPIInstanceFT table = {};
     table.setProperty = [](const CMPIInstance*, const char* name, const CMPIValue* value,
@@ -117,7 +117,7 @@ TEST(CmpiMacros, aPropertyValueIsHandedOnByAddress)
     EXPECT_EQ(lastCall.type, CMPI_sint32);
 }
 
-TEST(CmpiMacros, aTraceMessageReachesTheBrokersTraceSlot)
+TEST(CmpiMacrosTest, ATraceMessageReachesTheBrokersTraceSlot)
 {
     CMPIBrokerEncFT table = {};
     table.trace = [](const CMPIBroker*, CMPILevel level, const char* component, const char* text,
@@ -132,7 +132,7 @@ TEST(CmpiMacros, aTraceMessageReachesTheBrokersTraceSlot)
     EXPECT_EQ(lastCall.type, CMPI_LEV_WARNING);
 }
 
-TEST(CmpiMacros, aStatusWithCharactersHasNoMessageWithoutABroker)
+TEST(CmpiMacrosTest, AStatusWithCharactersHasNoMessageWithoutABroker)
 {
     CMPIString* const other = reinterpret_cast<CMPIString*>(&lastCall);
     CMPIStatus status = {CMPI_RC_OK, other};
@@ -142,7 +142,7 @@ TEST(CmpiMacros, aStatusWithCharactersHasNoMessageWithoutABroker)
     CMSetStatusWithChars(nullptr, nullptr, CMPI_RC_ERR_FAILED, "text"); // no status, no crash
 }
 
-TEST(CmpiMacros, anObjectIsNullWithoutAHandle)
+TEST(CmpiMacrosTest, AnObjectIsNullWithoutAHandle)
 {
     CMPIString* none = nullptr;
     CMPIString empty = {nullptr, nullptr};

@@ -26,7 +26,7 @@ using Testing::testchip;
 using Testing::walk;
 using Vorn::NodeLexicon::NodeType;
 
-using HwmonChange = HwmonTest;
+using HwmonChangeTest = HwmonTest;
 
 constexpr const char* nvme = "hwmon/hwmon1";
 
@@ -38,7 +38,7 @@ std::vector<std::string> paths()
     return found;
 }
 
-TEST_F(HwmonChange, aChipThatVanishedOrCameBackShowsAtTheNextRequest)
+TEST_F(HwmonChangeTest, AChipThatVanishedOrCameBackShowsAtTheNextRequest)
 {
     BoundSysfs sysfs("hotplug");
     const auto before = paths();
@@ -51,7 +51,7 @@ TEST_F(HwmonChange, aChipThatVanishedOrCameBackShowsAtTheNextRequest)
     EXPECT_EQ(paths(), before);
 }
 
-TEST_F(HwmonChange, aChipThatTookAnothersPlaceIsTakenForWhatItIs)
+TEST_F(HwmonChangeTest, AChipThatTookAnothersPlaceIsTakenForWhatItIs)
 {
     BoundSysfs sysfs("hotplug");
     walk();
@@ -59,7 +59,7 @@ TEST_F(HwmonChange, aChipThatTookAnothersPlaceIsTakenForWhatItIs)
     EXPECT_THAT(paths(), testing::Contains("/hwmon/other-pci-0200/temp1"));
 }
 
-TEST_F(HwmonChange, anAttributeThatADriverAddsShowsAtTheNextRequest)
+TEST_F(HwmonChangeTest, AnAttributeThatADriverAddsShowsAtTheNextRequest)
 {
     OneChip chip(Attributes{{"temp1_input", "20000"}});
     EXPECT_THAT(walk(), SizeIs(1));
@@ -67,7 +67,7 @@ TEST_F(HwmonChange, anAttributeThatADriverAddsShowsAtTheNextRequest)
     EXPECT_THAT(walk(), SizeIs(2));
 }
 
-TEST_F(HwmonChange, aListedNodeWhoseChipVanishedIsLost)
+TEST_F(HwmonChangeTest, AListedNodeWhoseChipVanishedIsLost)
 {
     BoundSysfs sysfs("hotplug");
     Vorn::HwmonSource source;
@@ -82,7 +82,7 @@ TEST_F(HwmonChange, aListedNodeWhoseChipVanishedIsLost)
     EXPECT_EQ(source.read(nodes[0]).reading, 44.0);
 }
 
-TEST_F(HwmonChange, aListedNodeOutlivesChangesElsewhere)
+TEST_F(HwmonChangeTest, AListedNodeOutlivesChangesElsewhere)
 {
     BoundSysfs sysfs("hotplug");
     Vorn::HwmonSource source;
@@ -93,7 +93,7 @@ TEST_F(HwmonChange, aListedNodeOutlivesChangesElsewhere)
     EXPECT_EQ(source.read(nodes.at(2)).reading, 35.85);
 }
 
-TEST_F(HwmonChange, nodesOfEarlierListingsCanBeRead)
+TEST_F(HwmonChangeTest, NodesOfEarlierListingsCanBeRead)
 {
     const BoundSysfs sysfs("server");
     Vorn::HwmonSource source;
@@ -103,7 +103,7 @@ TEST_F(HwmonChange, nodesOfEarlierListingsCanBeRead)
     EXPECT_EQ(source.read(fans.at(0)).baseUnits, 19U);
 }
 
-TEST_F(HwmonChange, aChangedConfigurationHoldsAtTheNextRequest)
+TEST_F(HwmonChangeTest, AChangedConfigurationHoldsAtTheNextRequest)
 {
     const OneChip chip(Attributes{{"temp1_input", "20000"}});
     EXPECT_EQ(walk().at(0).description, "temp1");
@@ -113,7 +113,7 @@ TEST_F(HwmonChange, aChangedConfigurationHoldsAtTheNextRequest)
     EXPECT_THAT(walk(), IsEmpty());
 }
 
-TEST_F(HwmonChange, twoCursorsOnOneThreadDoNotBlockEachOther)
+TEST_F(HwmonChangeTest, TwoCursorsOnOneThreadDoNotBlockEachOther)
 {
     BoundSysfs sysfs("hotplug");
     Vorn::Instrumentation first;
@@ -125,7 +125,7 @@ TEST_F(HwmonChange, twoCursorsOnOneThreadDoNotBlockEachOther)
     EXPECT_EQ(second.getNodeStatus(), 1U);
 }
 
-TEST_F(HwmonChange, aRecordedMachineReplaysToTheSameNodes)
+TEST_F(HwmonChangeTest, ARecordedMachineReplaysToTheSameNodes)
 {
     for (const std::string tree : {"desktop", "server", "hotplug"}) {
         const BoundSysfs sysfs(tree);
@@ -152,7 +152,7 @@ std::optional<double> expectedReading(const Testing::SeenNode& node)
     return readings.at(node.path);
 }
 
-TEST_F(HwmonChange, eightThreadsReadWhileChipsComeAndGo)
+TEST_F(HwmonChangeTest, EightThreadsReadWhileChipsComeAndGo)
 {
     BoundSysfs sysfs("hotplug");
     std::atomic<bool> goOn{true};

@@ -104,7 +104,7 @@ void expectSame(const SeenNode& node, const Feature& feature)
     EXPECT_EQ(node.values.status == 13, !reading.has_value()) << node.path;
 }
 
-class Oracle : public HwmonTest, public testing::WithParamInterface<const char*> {};
+class OracleTest : public HwmonTest, public testing::WithParamInterface<const char*> {};
 
 // Compares every feature that sensors shows, and makes sure that we show no other.
 void expectSameMachine()
@@ -126,13 +126,13 @@ void expectSameMachine()
     EXPECT_EQ(nodes.size(), compared);
 }
 
-TEST_P(Oracle, agreesOnEveryReadingLimitAndLabel)
+TEST_P(OracleTest, AgreesOnEveryReadingLimitAndLabel)
 {
     const BoundSysfs sysfs(GetParam());
     expectSameMachine();
 }
 
-TEST_P(Oracle, agreesUnderAConfigurationOfTheAdministrator)
+TEST_P(OracleTest, AgreesUnderAConfigurationOfTheAdministrator)
 {
     configuration().write("chip \"*-*\"\n"
                           "  label temp1 \"First\"\n"
@@ -145,7 +145,7 @@ TEST_P(Oracle, agreesUnderAConfigurationOfTheAdministrator)
     expectSameMachine();
 }
 
-INSTANTIATE_TEST_SUITE_P(Trees, Oracle, testing::Values("desktop", "server", "hotplug"),
+INSTANTIATE_TEST_SUITE_P(Trees, OracleTest, testing::Values("desktop", "server", "hotplug"),
     [](const auto& tree) { return std::string(tree.param); });
 
 } // namespace HwmonOracleTests

@@ -30,22 +30,20 @@ using Testing::testchip;
 using Testing::walk;
 using Vorn::NodeLexicon::NodeType;
 
-using Hwmon = HwmonTest;
-
-TEST_F(Hwmon, aMachineWithoutTheHwmonClassHasNoSensors)
+TEST_F(HwmonTest, AMachineWithoutTheHwmonClassHasNoSensors)
 {
     BoundSysfs sysfs("");
     sysfs.remove("hwmon");
     EXPECT_THAT(walk(), IsEmpty());
 }
 
-TEST_F(Hwmon, aMachineWithoutChipsHasNoSensors)
+TEST_F(HwmonTest, AMachineWithoutChipsHasNoSensors)
 {
     const BoundSysfs sysfs("");
     EXPECT_THAT(walk(), IsEmpty());
 }
 
-TEST_F(Hwmon, eachKindHasItsTypeItsUnitsAndItsScale)
+TEST_F(HwmonTest, EachKindHasItsTypeItsUnitsAndItsScale)
 {
     const OneChip chip({{"temp1_input", "41500"}, {"in0_input", "1024"}, {"fan1_input", "900"},
         {"power1_input", "1"}, {"curr1_input", "1"}, {"humidity1_input", "1"}});
@@ -68,7 +66,7 @@ TEST_F(Hwmon, eachKindHasItsTypeItsUnitsAndItsScale)
     EXPECT_EQ(fan.values.reading, 900.0);
 }
 
-TEST_F(Hwmon, everyLimitBecomesItsThreshold)
+TEST_F(HwmonTest, EveryLimitBecomesItsThreshold)
 {
     const SeenNode node = nodeOf({{"temp1_input", "50000"}, {"temp1_min", "5000"},
         {"temp1_max", "80000"}, {"temp1_lcrit", "-10000"}, {"temp1_crit", "95000"},
@@ -84,7 +82,7 @@ TEST_F(Hwmon, everyLimitBecomesItsThreshold)
                                .possibleStates = {{1, 22, 23, 25, 26}}}));
 }
 
-TEST_F(Hwmon, theAverageStandsInWhereThereIsNoInput)
+TEST_F(HwmonTest, TheAverageStandsInWhereThereIsNoInput)
 {
     EXPECT_EQ(nodeOf({{"in1_average", "3300"}}).values.reading, 3.3);
     EXPECT_EQ(nodeOf({{"in1_average", "3300"}, {"in1_input", "5000"}}).values.reading, 5.0);
@@ -95,7 +93,7 @@ TEST_F(Hwmon, theAverageStandsInWhereThereIsNoInput)
 // libsensors opens the attribute at every reading. These are the ways in which that can fail
 // without a driver's help: it says "Kernel interface error" where the file cannot be opened, and
 // "Can't read" where it holds no number or reading it fails.
-TEST_F(Hwmon, anAttributeThatCannotBeReadNowIsLostNow)
+TEST_F(HwmonTest, AnAttributeThatCannotBeReadNowIsLostNow)
 {
     OneChip chip(Attributes{{"temp1_input", "50000"}});
     Vorn::HwmonSource source;
@@ -115,7 +113,7 @@ TEST_F(Hwmon, anAttributeThatCannotBeReadNowIsLostNow)
     EXPECT_EQ(source.read(node).reading, 51.0);
 }
 
-TEST_F(Hwmon, readsAfreshAtEveryVisit)
+TEST_F(HwmonTest, ReadsAfreshAtEveryVisit)
 {
     OneChip chip(Attributes{{"temp1_input", "41000"}});
     Vorn::Instrumentation cursor;
@@ -127,7 +125,7 @@ TEST_F(Hwmon, readsAfreshAtEveryVisit)
     EXPECT_EQ(only(walk()).values.reading, 42.0);
 }
 
-TEST_F(Hwmon, aLabelIsMadeValidAndTrimmed)
+TEST_F(HwmonTest, ALabelIsMadeValidAndTrimmed)
 {
     const auto description = [](const std::string& label) {
         return nodeOf({{"temp1_input", "1000"}, {"temp1_label", label}}).description;
@@ -144,7 +142,7 @@ TEST_F(Hwmon, aLabelIsMadeValidAndTrimmed)
     EXPECT_EQ(nodeOf({{"temp1_input", "1000"}}).description, "temp1");
 }
 
-TEST_F(Hwmon, theConfigurationLabelsComputesAndIgnores)
+TEST_F(HwmonTest, TheConfigurationLabelsComputesAndIgnores)
 {
     configuration().write("chip \"testchip-*\"\n"
                           "  label temp1 \"  Board \xFF \"\n"
@@ -158,13 +156,13 @@ TEST_F(Hwmon, theConfigurationLabelsComputesAndIgnores)
     EXPECT_EQ(node.values.upperNonCritical, 60.0);
 }
 
-TEST_F(Hwmon, aValueComputedToNoNumberIsLost)
+TEST_F(HwmonTest, AValueComputedToNoNumberIsLost)
 {
     configuration().write("chip \"*-*\"\n  compute temp1 1/(@-@), @\n");
     EXPECT_EQ(nodeOf({{"temp1_input", "20000"}}).values.status, 13U);
 }
 
-TEST_F(Hwmon, chipsAreSortedByNameAndFeaturesStandAsInTheDriver)
+TEST_F(HwmonTest, ChipsAreSortedByNameAndFeaturesStandAsInTheDriver)
 {
     BoundSysfs sysfs("");
     for (const std::string name : {"zeta", "alpha", "mid"}) {
@@ -183,7 +181,7 @@ TEST_F(Hwmon, chipsAreSortedByNameAndFeaturesStandAsInTheDriver)
             "/hwmon/zeta-isa-0001/temp2", "/hwmon/zeta-isa-0001/temp10"));
 }
 
-TEST_F(Hwmon, aWrongConfigurationIsReportedOnceAndTheRestHolds)
+TEST_F(HwmonTest, AWrongConfigurationIsReportedOnceAndTheRestHolds)
 {
     const Testing::LogCapture capture;
     configuration().write("chip \"testchip-*\"\n  label temp1 \"Board\"\n  nonsense here\n");
@@ -197,7 +195,7 @@ TEST_F(Hwmon, aWrongConfigurationIsReportedOnceAndTheRestHolds)
     EXPECT_EQ(capture.log()[0].level, 6000);
 }
 
-TEST_F(Hwmon, aConfigurationMayBeWrongFromTheFirstLineOnThoughItIsReadAgain)
+TEST_F(HwmonTest, AConfigurationMayBeWrongFromTheFirstLineOnThoughItIsReadAgain)
 {
     const Testing::LogCapture capture;
     configuration().write("label temp1 \"Stray\"\nchip \"*\"\n  compute temp1 @*3, @/3\n");
@@ -210,7 +208,7 @@ TEST_F(Hwmon, aConfigurationMayBeWrongFromTheFirstLineOnThoughItIsReadAgain)
     EXPECT_EQ(capture.log()[0].text, "/etc/sensors3.conf:2: Parse error in chip name");
 }
 
-TEST_F(Hwmon, theFolderOfConfigurationsAddsToTheFile)
+TEST_F(HwmonTest, TheFolderOfConfigurationsAddsToTheFile)
 {
     const Testing::LogCapture capture;
     const Testing::TemporaryFolder folder;
@@ -223,7 +221,7 @@ TEST_F(Hwmon, theFolderOfConfigurationsAddsToTheFile)
     EXPECT_THAT(capture.log()[0].text, HasSubstr("/etc/sensors.d/20-wrong.conf:3: "));
 }
 
-TEST_F(Hwmon, aConfigurationThatCannotBeReadIsNamed)
+TEST_F(HwmonTest, AConfigurationThatCannotBeReadIsNamed)
 {
     const Testing::TemporaryFolder folder;
     folder.write("large.conf", std::string(2'000'000, '\n'));
@@ -233,7 +231,7 @@ TEST_F(Hwmon, aConfigurationThatCannotBeReadIsNamed)
         "sensors configuration /etc/sensors.d/large.conf: Larger than 1048576 bytes");
 }
 
-TEST_F(Hwmon, aMachineWithoutSysfsSaysThatLibsensorsCannotBeUsed)
+TEST_F(HwmonTest, AMachineWithoutSysfsSaysThatLibsensorsCannotBeUsed)
 {
     const Testing::LogCapture capture;
     const Testing::TemporaryFolder empty;
@@ -248,7 +246,7 @@ TEST_F(Hwmon, aMachineWithoutSysfsSaysThatLibsensorsCannotBeUsed)
     EXPECT_EQ(nodeOf({{"temp1_input", "20000"}}).values.reading, 20.0);
 }
 
-TEST_F(Hwmon, aFatalErrorOfLibsensorsIsALackOfMemoryAndNotTheEndOfTheProcess)
+TEST_F(HwmonTest, AFatalErrorOfLibsensorsIsALackOfMemoryAndNotTheEndOfTheProcess)
 {
     const OneChip chip(Attributes{{"temp1_input", "20000"}});
     walk();

@@ -13,17 +13,15 @@ using testing::ElementsAre;
 using Testing::HwmonTest;
 using Testing::nodeOf;
 
-using Hwmon = HwmonTest;
-
 struct Row {
     std::string name;
     Attributes attributes;
     unsigned status;
 };
 
-class HwmonStatus : public HwmonTest, public testing::WithParamInterface<Row> {};
+class HwmonStatusTest : public HwmonTest, public testing::WithParamInterface<Row> {};
 
-TEST_P(HwmonStatus, followsFromTheAttributes)
+TEST_P(HwmonStatusTest, FollowsFromTheAttributes)
 {
     EXPECT_EQ(nodeOf(GetParam().attributes).values.status, GetParam().status);
 }
@@ -71,10 +69,10 @@ const Row rows[] = {
     {"aFanWhoseMinimumNobodySetMayStandStill", {{"fan1_input", "0"}, {"fan1_min", "0"}}, 1},
 };
 
-INSTANTIATE_TEST_SUITE_P(
-    EveryRow, HwmonStatus, testing::ValuesIn(rows), [](const auto& row) { return row.param.name; });
+INSTANTIATE_TEST_SUITE_P(EveryRow, HwmonStatusTest, testing::ValuesIn(rows),
+    [](const auto& row) { return row.param.name; });
 
-TEST_F(Hwmon, limitsThatNobodySetAreAbsent)
+TEST_F(HwmonTest, LimitsThatNobodySetAreAbsent)
 {
     const auto values = nodeOf(
         {{"in1_input", "1000"}, {"in1_min", "0"}, {"in1_max", "0"}, {"in1_lcrit", "0"},
@@ -85,7 +83,7 @@ TEST_F(Hwmon, limitsThatNobodySetAreAbsent)
     EXPECT_THAT(*values.possibleStates, ElementsAre(1));
 }
 
-TEST_F(Hwmon, aLimitThatCannotBeReadIsAbsent)
+TEST_F(HwmonTest, ALimitThatCannotBeReadIsAbsent)
 {
     const auto values =
         nodeOf({{"temp1_input", "50000"}, {"temp1_max", "N/A"}, {"temp1_crit", "90000"}}).values;
@@ -93,7 +91,7 @@ TEST_F(Hwmon, aLimitThatCannotBeReadIsAbsent)
     EXPECT_EQ(values.upperCritical, 90.0);
 }
 
-TEST_F(Hwmon, aZeroBesideALimitThatCannotBeReadIsMeant)
+TEST_F(HwmonTest, AZeroBesideALimitThatCannotBeReadIsMeant)
 {
     const auto values =
         nodeOf({{"in1_input", "1000"}, {"in1_min", "0"}, {"in1_max", "N/A"}}).values;
@@ -104,7 +102,7 @@ TEST_F(Hwmon, aZeroBesideALimitThatCannotBeReadIsMeant)
         nodeOf({{"in1_input", "0"}, {"in1_min", "0"}, {"in1_max", "N/A"}}).values.status, 22U);
 }
 
-TEST_F(Hwmon, aChannelWithAFaultShowsItsLimitsButNoReading)
+TEST_F(HwmonTest, AChannelWithAFaultShowsItsLimitsButNoReading)
 {
     const auto values =
         nodeOf({{"temp1_input", "-128000"}, {"temp1_fault", "1"}, {"temp1_max", "80000"}}).values;

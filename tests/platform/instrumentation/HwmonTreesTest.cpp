@@ -11,7 +11,7 @@ namespace HwmonTreesTests {
 using Testing::BoundSysfs;
 using Testing::HwmonTest;
 
-using HwmonTrees = HwmonTest;
+using HwmonTreesTest = HwmonTest;
 
 // The channels that are not normal, by path.
 std::map<std::string, unsigned> statusesBesideNormal()
@@ -23,7 +23,7 @@ std::map<std::string, unsigned> statusesBesideNormal()
     return statuses;
 }
 
-TEST_F(HwmonTrees, aDesktopBoardShowsItsUnconnectedInputs)
+TEST_F(HwmonTreesTest, ADesktopBoardShowsItsUnconnectedInputs)
 {
     const BoundSysfs sysfs("desktop");
     EXPECT_EQ(statusesBesideNormal(), (std::map<std::string, unsigned>{
@@ -38,7 +38,7 @@ TEST_F(HwmonTrees, aDesktopBoardShowsItsUnconnectedInputs)
                                       }));
 }
 
-TEST_F(HwmonTrees, aServerShowsWhatIsHotFailedDisabledAndLost)
+TEST_F(HwmonTreesTest, AServerShowsWhatIsHotFailedDisabledAndLost)
 {
     const BoundSysfs sysfs("server");
     EXPECT_EQ(statusesBesideNormal(), (std::map<std::string, unsigned>{

@@ -58,7 +58,7 @@ double readingAt(Instrumentation& cursor)
     return value;
 }
 
-TEST(Cursor, readsANodeOncePerVisitAndAfreshAtTheNext)
+TEST(CursorTest, ReadsANodeOncePerVisitAndAfreshAtTheNext)
 {
     const CountingMachine machine;
     Instrumentation cursor;
@@ -72,7 +72,7 @@ TEST(Cursor, readsANodeOncePerVisitAndAfreshAtTheNext)
     EXPECT_EQ(cursor.getNodeStatus(), 3U);
 }
 
-TEST(Cursor, doesNotReadANodeThatNobodyAsks)
+TEST(CursorTest, DoesNotReadANodeThatNobodyAsks)
 {
     const CountingMachine machine;
     Instrumentation cursor;
@@ -85,7 +85,7 @@ TEST(Cursor, doesNotReadANodeThatNobodyAsks)
     EXPECT_EQ(cursor.getNodeStatus(), 1U);
 }
 
-TEST(Cursor, standsOnNothingBeforeASelectionAndAfterTheLastNode)
+TEST(CursorTest, StandsOnNothingBeforeASelectionAndAfterTheLastNode)
 {
     const CountingMachine machine;
     Instrumentation cursor;
@@ -100,7 +100,7 @@ TEST(Cursor, standsOnNothingBeforeASelectionAndAfterTheLastNode)
     EXPECT_THROW(cursor.getNodeStatus(), std::out_of_range);
 }
 
-TEST(Cursor, showsTheNodesOfAllSourcesInTheOrderOfTheSetting)
+TEST(CursorTest, ShowsTheNodesOfAllSourcesInTheOrderOfTheSetting)
 {
     const ScriptedMachine scripted({{NodeType::Voltage, "/s", "S", {}}});
     const CountingMachine counting;
@@ -112,7 +112,7 @@ TEST(Cursor, showsTheNodesOfAllSourcesInTheOrderOfTheSetting)
     EXPECT_THAT(paths, ElementsAre("/s", "/a", "/b"));
 }
 
-TEST(Cursor, givesAPropertyOnlyInItsOwnKind)
+TEST(CursorTest, GivesAPropertyOnlyInItsOwnKind)
 {
     const ScriptedMachine machine({{NodeType::Temperature, "/n", "N",
         {.reading = 1,
@@ -152,7 +152,7 @@ TEST(Cursor, givesAPropertyOnlyInItsOwnKind)
     EXPECT_THAT(codes, ElementsAre(9));
 }
 
-TEST(Cursor, leavesTheValueAloneWhenTheNodeLacksTheProperty)
+TEST(CursorTest, LeavesTheValueAloneWhenTheNodeLacksTheProperty)
 {
     const ScriptedMachine machine({{NodeType::Temperature, "/n", "N", {}}});
     Instrumentation cursor;
@@ -168,7 +168,7 @@ TEST(Cursor, leavesTheValueAloneWhenTheNodeLacksTheProperty)
     EXPECT_THAT(codes, ElementsAre(7));
 }
 
-TEST(Cursor, makesPathsPrintable)
+TEST(CursorTest, MakesPathsPrintable)
 {
     const CountingMachine machine;
     const Instrumentation cursor;
@@ -176,7 +176,7 @@ TEST(Cursor, makesPathsPrintable)
     EXPECT_EQ(cursor.convertPathToString("/a\n\xFF"), "/a\\n\xEF\xBF\xBD");
 }
 
-TEST(Settings, areReadAtEveryConstruction)
+TEST(SettingsTest, AreReadAtEveryConstruction)
 {
     const ScriptedMachine machine({{NodeType::Voltage, "/v", "V", {}}});
     EXPECT_THAT(walk(), SizeIs(1));
@@ -184,7 +184,7 @@ TEST(Settings, areReadAtEveryConstruction)
     EXPECT_THAT(walk(), SizeIs(6));
 }
 
-TEST(Cursor, isUsedOnManyThreadsAtOnce)
+TEST(CursorTest, IsUsedOnManyThreadsAtOnce)
 {
     const CountingMachine machine;
     std::vector<std::jthread> threads;
@@ -218,7 +218,7 @@ std::vector<std::string> textsOf(const LogCapture& capture)
 }
 
 // A failure that an earlier test left on record would not be reported.
-class Failure : public testing::Test {
+class FailureTest : public testing::Test {
 protected:
     void TearDown() override
     {
@@ -227,7 +227,7 @@ protected:
     }
 };
 
-TEST_F(Failure, atConstructionIsReportedOnce)
+TEST_F(FailureTest, AtConstructionIsReportedOnce)
 {
     const LogCapture capture;
     ScriptedMachine machine;
@@ -239,7 +239,7 @@ TEST_F(Failure, atConstructionIsReportedOnce)
         ElementsAre("source \"scripted\" cannot be used: scripted: construction"));
 }
 
-TEST_F(Failure, thatComesBackIsReportedAgain)
+TEST_F(FailureTest, ThatComesBackIsReportedAgain)
 {
     const LogCapture capture;
     ScriptedMachine machine;
@@ -252,7 +252,7 @@ TEST_F(Failure, thatComesBackIsReportedAgain)
     EXPECT_THAT(textsOf(capture), SizeIs(2));
 }
 
-TEST_F(Failure, ofOneNodeTypeIsReportedOnceThoughTheOthersWork)
+TEST_F(FailureTest, OfOneNodeTypeIsReportedOnceThoughTheOthersWork)
 {
     const LogCapture capture;
     ScriptedMachine machine;
@@ -263,7 +263,7 @@ TEST_F(Failure, ofOneNodeTypeIsReportedOnceThoughTheOthersWork)
         textsOf(capture), ElementsAre("source \"scripted\" cannot be used: scripted: selection"));
 }
 
-TEST_F(Failure, ofAReadingIsReportedOnceThoughOtherNodesCanBeRead)
+TEST_F(FailureTest, OfAReadingIsReportedOnceThoughOtherNodesCanBeRead)
 {
     const LogCapture capture;
     const ScriptedMachine machine({{NodeType::Voltage, "/1", "1", {}},
@@ -275,7 +275,7 @@ TEST_F(Failure, ofAReadingIsReportedOnceThoughOtherNodesCanBeRead)
         textsOf(capture), ElementsAre("source \"scripted\" cannot be used: scripted: reading"));
 }
 
-TEST_F(Failure, withAnotherReasonIsReported)
+TEST_F(FailureTest, WithAnotherReasonIsReported)
 {
     const LogCapture capture;
     const EnvironmentVariable environment("VORN_INSTRUMENTATION", "reasons");
@@ -289,7 +289,7 @@ TEST_F(Failure, withAnotherReasonIsReported)
                                       "source \"reasons\" cannot be used: second"));
 }
 
-TEST_F(Failure, ofASettingIsReportedOnce)
+TEST_F(FailureTest, OfASettingIsReportedOnce)
 {
     const LogCapture capture;
     const EnvironmentVariable environment("VORN_INSTRUMENTATION", "nonsense,");

@@ -39,7 +39,7 @@ MachineFileNode nodeOf(const std::string& members)
     return readMachineFile(nodeWith(members)).at(0);
 }
 
-TEST(Model, holdsEveryMember)
+TEST(ModelTest, HoldsEveryMember)
 {
     const auto nodes = readMachineFile(R"({ "nodes": [
       { "type": "temperature", "path": "/board/cpu0/temp1", "description": "CPU 1 Temp",
@@ -65,13 +65,13 @@ TEST(Model, holdsEveryMember)
     EXPECT_EQ(node.values, values);
 }
 
-TEST(Model, leavesOutWhatIsNotThere)
+TEST(ModelTest, LeavesOutWhatIsNotThere)
 {
     EXPECT_EQ(nodeOf("").values, Vorn::NodeReading{});
     EXPECT_EQ(nodeOf(R"("possibleStates":[])").values.possibleStates, std::vector<unsigned>{});
 }
 
-TEST(Model, takesTheTypesNumberForTheSensorType)
+TEST(ModelTest, TakesTheTypesNumberForTheSensorType)
 {
     const auto nodes = readMachineFile(R"({"nodes":[
         {"path":"/1","description":"","type":"temperature"},
@@ -84,13 +84,13 @@ TEST(Model, takesTheTypesNumberForTheSensorType)
     EXPECT_EQ(nodeOf(R"("sensorType":0)").sensorType, 0U);
 }
 
-TEST(Model, mayBeEmpty)
+TEST(ModelTest, MayBeEmpty)
 {
     EXPECT_THAT(readMachineFile(R"({"nodes":[]})"), IsEmpty());
     EXPECT_THAT(readMachineFile("\xEF\xBB\xBF{\"nodes\":[]}\n"), IsEmpty());
 }
 
-TEST(Model, readsNumbersOfEveryForm)
+TEST(ModelTest, ReadsNumbersOfEveryForm)
 {
     EXPECT_EQ(nodeOf(R"("reading":-0.0)").values.reading, 0.0);
     EXPECT_EQ(nodeOf(R"("reading":1e3)").values.reading, 1000.0);
@@ -114,7 +114,7 @@ void compileCommaLocale(const Testing::TemporaryFolder& folder)
         throw std::runtime_error("localedef made no locale: is the package locales installed?");
 }
 
-TEST(Model, readsNumbersAlikeInAProcessWithADecimalComma)
+TEST(ModelTest, ReadsNumbersAlikeInAProcessWithADecimalComma)
 {
     const Testing::TemporaryFolder folder;
     compileCommaLocale(folder);
@@ -128,7 +128,7 @@ TEST(Model, readsNumbersAlikeInAProcessWithADecimalComma)
     EXPECT_EQ(reading, 41.5);
 }
 
-TEST(Model, keepsTextsAsTheyStand)
+TEST(ModelTest, KeepsTextsAsTheyStand)
 {
     const auto nodes = readMachineFile(
         R"({"nodes":[{"type":"voltage","path":"/\u00e4/\"\\","description":" 温度 \ud83c\udf21 "}]})");
@@ -141,9 +141,9 @@ struct Refusal {
     std::string error;
 };
 
-class RefusedModel : public testing::TestWithParam<Refusal> {};
+class RefusedModelTest : public testing::TestWithParam<Refusal> {};
 
-TEST_P(RefusedModel, namesThePlaceAndTheReason)
+TEST_P(RefusedModelTest, NamesThePlaceAndTheReason)
 {
     EXPECT_EQ(errorOf([&] { readMachineFile(GetParam().document); }), GetParam().error);
 }
@@ -167,7 +167,7 @@ const Refusal shapes[] = {
     {R"({"nodes":[[]]})", "/nodes/0: expected an object, found an array"},
     {R"({"nodes":[)" + node + R"(,false]})", "/nodes/1: expected an object, found false"},
 };
-INSTANTIATE_TEST_SUITE_P(Shapes, RefusedModel, testing::ValuesIn(shapes));
+INSTANTIATE_TEST_SUITE_P(Shapes, RefusedModelTest, testing::ValuesIn(shapes));
 
 const Refusal members[] = {
     {R"({"nodes":[{"path":"/v","description":"V"}]})", "/nodes/0: member \"type\" is missing"},
@@ -213,16 +213,16 @@ const Refusal members[] = {
     {R"({"nodes":[{"description":"\u0000"}]})",
         "/nodes/0/description: the string holds the character NUL"},
 };
-INSTANTIATE_TEST_SUITE_P(Members, RefusedModel, testing::ValuesIn(members));
+INSTANTIATE_TEST_SUITE_P(Members, RefusedModelTest, testing::ValuesIn(members));
 
 const Refusal texts[] = {
     {"{\"nodes\":[]}\0"s, "line 1, column 13: the file holds the character NUL"},
     {"\0"s, "line 1, column 1: the file holds the character NUL"},
     {"{\n\"nodes\":\n[\0]}"s, "line 3, column 2: the file holds the character NUL"},
 };
-INSTANTIATE_TEST_SUITE_P(Nul, RefusedModel, testing::ValuesIn(texts));
+INSTANTIATE_TEST_SUITE_P(Nul, RefusedModelTest, testing::ValuesIn(texts));
 
-TEST(BrokenJson, isPlacedByLineAndColumn)
+TEST(BrokenJsonTest, IsPlacedByLineAndColumn)
 {
     const std::pair<std::string, std::string> documents[] = {
         {"", "line 1, column 1: "},
@@ -242,20 +242,20 @@ TEST(BrokenJson, isPlacedByLineAndColumn)
             << document;
 }
 
-TEST(BrokenJson, saysWhatWasExpectedWithoutTheNameOfALibrary)
+TEST(BrokenJsonTest, SaysWhatWasExpectedWithoutTheNameOfALibrary)
 {
     const std::string error = errorOf([] { readMachineFile("{\"nodes\":[],}"); });
     EXPECT_THAT(error, HasSubstr("expected string literal"));
     EXPECT_THAT(error, testing::Not(HasSubstr("json.exception")));
 }
 
-TEST(BrokenJson, aNumberBeyondADoubleIsRefused)
+TEST(BrokenJsonTest, ANumberBeyondADoubleIsRefused)
 {
     EXPECT_THAT(errorOf([] { readMachineFile(nodeWith("\"reading\":1e999")); }),
         testing::MatchesRegex("line 1, column 7[0-9]: number overflow parsing '1e999'"));
 }
 
-TEST(BrokenJson, everyTruncationOfAModelIsRefused)
+TEST(BrokenJsonTest, EveryTruncationOfAModelIsRefused)
 {
     const std::string document = nodeWith(R"("reading":41.5,"possibleStates":[1,23])");
     ASSERT_EQ(errorOf([&] { readMachineFile(document); }), "");
@@ -265,7 +265,7 @@ TEST(BrokenJson, everyTruncationOfAModelIsRefused)
             << length;
 }
 
-TEST(HostileModel, aHundredMegabytesOfNestingAreRefusedAtOnce)
+TEST(HostileModelTest, AHundredMegabytesOfNestingAreRefusedAtOnce)
 {
     const std::string brackets(100'000'000, '[');
     EXPECT_EQ(errorOf([&] { readMachineFile(brackets); }),
@@ -277,7 +277,7 @@ TEST(HostileModel, aHundredMegabytesOfNestingAreRefusedAtOnce)
         "line 1, column 46: the values are nested too deeply");
 }
 
-TEST(HostileModel, aLongStringIsCutInTheMessage)
+TEST(HostileModelTest, ALongStringIsCutInTheMessage)
 {
     const std::string longName(1'000'000, 'x');
     const auto lengthOf = [](const std::string& document) {
@@ -289,7 +289,7 @@ TEST(HostileModel, aLongStringIsCutInTheMessage)
     EXPECT_GT(lengthOf("{\"" + longName), 20U);
 }
 
-TEST(HostileModel, controlCharactersAreEscapedInTheMessage)
+TEST(HostileModelTest, ControlCharactersAreEscapedInTheMessage)
 {
     EXPECT_EQ(errorOf([] { readMachineFile(nodeWith(R"("a\nb":1)")); }),
         "/nodes/0/a\\nb: there is no such member");

@@ -55,7 +55,7 @@ protected:
         "VORN_INSTRUMENTATION", Vorn::formatSourceEntry("model", path())};
 };
 
-TEST_F(MachineFileSourceTest, isServedInItsOwnOrder)
+TEST_F(MachineFileSourceTest, IsServedInItsOwnOrder)
 {
     write(R"({"nodes":[
         {"type":"voltage","path":"/1","description":"first","reading":3.3},
@@ -73,7 +73,7 @@ TEST_F(MachineFileSourceTest, isServedInItsOwnOrder)
     EXPECT_EQ(nodes[2].values.status, 1U);
 }
 
-TEST_F(MachineFileSourceTest, isReadAfreshWhenItChanged)
+TEST_F(MachineFileSourceTest, IsReadAfreshWhenItChanged)
 {
     for (const std::string description : {"one", "two", "six"}) {
         write(modelOf(description));
@@ -83,7 +83,7 @@ TEST_F(MachineFileSourceTest, isReadAfreshWhenItChanged)
     }
 }
 
-TEST_F(MachineFileSourceTest, isReadAfreshThoughItsTimeWasSetBack)
+TEST_F(MachineFileSourceTest, IsReadAfreshThoughItsTimeWasSetBack)
 {
     write(modelOf("one"));
     struct stat status {};
@@ -96,7 +96,7 @@ TEST_F(MachineFileSourceTest, isReadAfreshThoughItsTimeWasSetBack)
     EXPECT_EQ(walk().at(0).description, "two");
 }
 
-TEST_F(MachineFileSourceTest, isReadWhateverTimeItClaims)
+TEST_F(MachineFileSourceTest, IsReadWhateverTimeItClaims)
 {
     write(modelOf("one"));
     const timespec farFuture = {10'413'792'000, 999'999'999}; // the year 2300
@@ -108,7 +108,7 @@ TEST_F(MachineFileSourceTest, isReadWhateverTimeItClaims)
     }
 }
 
-TEST_F(MachineFileSourceTest, isNotReadAgainWhileItStays)
+TEST_F(MachineFileSourceTest, IsNotReadAgainWhileItStays)
 {
     write(modelOf("one"));
     letItRest();
@@ -120,7 +120,7 @@ TEST_F(MachineFileSourceTest, isNotReadAgainWhileItStays)
     EXPECT_EQ(first->at(0).description, "one");
 }
 
-TEST_F(MachineFileSourceTest, thatJustChangedIsNotTrustedToShowTheNextChange)
+TEST_F(MachineFileSourceTest, ThatJustChangedIsNotTrustedToShowTheNextChange)
 {
     write(modelOf("one"));
     EXPECT_FALSE(Vorn::isSettled(Vorn::stampOfRegularFile(path())));
@@ -128,7 +128,7 @@ TEST_F(MachineFileSourceTest, thatJustChangedIsNotTrustedToShowTheNextChange)
     EXPECT_TRUE(Vorn::isSettled(Vorn::stampOfRegularFile(path())));
 }
 
-TEST_F(MachineFileSourceTest, moreFilesThanTheCacheKeepsAreServedAllTheSame)
+TEST_F(MachineFileSourceTest, MoreFilesThanTheCacheKeepsAreServedAllTheSame)
 {
     for (int turn = 0; turn < 2; ++turn)
         for (int number = 0; number < 20; ++number) {
@@ -139,7 +139,7 @@ TEST_F(MachineFileSourceTest, moreFilesThanTheCacheKeepsAreServedAllTheSame)
         }
 }
 
-TEST_F(MachineFileSourceTest, withACommaInItsNameIsServed)
+TEST_F(MachineFileSourceTest, WithACommaInItsNameIsServed)
 {
     const std::string file = folder_.write(R"(a,b\c.json)", modelOf("comma"));
     const EnvironmentVariable environment(
@@ -147,7 +147,7 @@ TEST_F(MachineFileSourceTest, withACommaInItsNameIsServed)
     EXPECT_EQ(walk().at(0).description, "comma");
 }
 
-TEST_F(MachineFileSourceTest, errorsNameTheFileThePlaceAndTheReason)
+TEST_F(MachineFileSourceTest, ErrorsNameTheFileThePlaceAndTheReason)
 {
     const std::string start = "model file " + path() + ": ";
     write(R"({"nodes":[{"status":"x"}]})");
@@ -164,19 +164,19 @@ TEST_F(MachineFileSourceTest, errorsNameTheFileThePlaceAndTheReason)
     EXPECT_NO_THROW(checkMachineFile(path()));
 }
 
-TEST_F(MachineFileSourceTest, thatIsMissingIsNamed)
+TEST_F(MachineFileSourceTest, ThatIsMissingIsNamed)
 {
     EXPECT_EQ(errorOf([&] { checkMachineFile(path()); }),
         "model file " + path() + ": No such file or directory");
 }
 
-TEST_F(MachineFileSourceTest, thatIsADirectoryIsRefused)
+TEST_F(MachineFileSourceTest, ThatIsADirectoryIsRefused)
 {
     EXPECT_EQ(errorOf([&] { checkMachineFile(folder_.path()); }),
         "model file " + folder_.path().string() + ": Is a directory");
 }
 
-TEST_F(MachineFileSourceTest, thatIsAPipeOrADeviceIsRefusedWithoutWaiting)
+TEST_F(MachineFileSourceTest, ThatIsAPipeOrADeviceIsRefusedWithoutWaiting)
 {
     ASSERT_EQ(mkfifo(path().c_str(), 0600), 0);
     EXPECT_EQ(errorOf([&] { checkMachineFile(path()); }),
@@ -185,7 +185,7 @@ TEST_F(MachineFileSourceTest, thatIsAPipeOrADeviceIsRefusedWithoutWaiting)
         errorOf([] { checkMachineFile("/dev/zero"); }), "model file /dev/zero: Not a regular file");
 }
 
-TEST_F(MachineFileSourceTest, thatIsTooLargeIsRefusedUnread)
+TEST_F(MachineFileSourceTest, ThatIsTooLargeIsRefusedUnread)
 {
     write("");
     ASSERT_EQ(truncate(path().c_str(), 1LL << 40U), 0);
@@ -194,7 +194,7 @@ TEST_F(MachineFileSourceTest, thatIsTooLargeIsRefusedUnread)
 }
 
 // Root may read everything, so a child that is nobody tries.
-TEST_F(MachineFileSourceTest, thatMayNotBeReadIsNamed)
+TEST_F(MachineFileSourceTest, ThatMayNotBeReadIsNamed)
 {
     write(modelOf("secret"));
     ASSERT_EQ(chmod(path().c_str(), 0), 0);
@@ -214,7 +214,7 @@ TEST_F(MachineFileSourceTest, thatMayNotBeReadIsNamed)
     EXPECT_EQ(WEXITSTATUS(status), 0);
 }
 
-TEST_F(MachineFileSourceTest, thatIsMalformedIsReportedOnceUntilItWasGood)
+TEST_F(MachineFileSourceTest, ThatIsMalformedIsReportedOnceUntilItWasGood)
 {
     const Testing::LogCapture capture;
     write("{");
@@ -229,7 +229,7 @@ TEST_F(MachineFileSourceTest, thatIsMalformedIsReportedOnceUntilItWasGood)
     EXPECT_THAT(capture.log(), SizeIs(2));
 }
 
-TEST_F(MachineFileSourceTest, isServedToManyThreadsWhileItChanges)
+TEST_F(MachineFileSourceTest, IsServedToManyThreadsWhileItChanges)
 {
     const auto replace = [&](const std::string& description) {
         const std::string file = folder_.write("next", modelOf(description));
@@ -252,7 +252,7 @@ TEST_F(MachineFileSourceTest, isServedToManyThreadsWhileItChanges)
     goOn = false;
 }
 
-TEST_F(MachineFileSourceTest, sixtyThousandSensorsAreServed)
+TEST_F(MachineFileSourceTest, SixtyThousandSensorsAreServed)
 {
     std::string text = "{\"nodes\":[";
     for (int number = 0; number < 60'000; ++number)
@@ -266,7 +266,7 @@ TEST_F(MachineFileSourceTest, sixtyThousandSensorsAreServed)
     EXPECT_EQ(nodes.back().path, "/t59999");
 }
 
-TEST_F(MachineFileSourceTest, recordedIsTheSameMachine)
+TEST_F(MachineFileSourceTest, RecordedIsTheSameMachine)
 {
     write(R"({"nodes":[
         {"type":"tachometer","path":"/f","description":"Fan \"A\" \\ 温度","status":1,
@@ -282,7 +282,7 @@ TEST_F(MachineFileSourceTest, recordedIsTheSameMachine)
     EXPECT_EQ(Vorn::recordMachineFile(), recorded);
 }
 
-TEST_F(MachineFileSourceTest, recordedHasOneLineForEveryNode)
+TEST_F(MachineFileSourceTest, RecordedHasOneLineForEveryNode)
 {
     write(modelOf("V"));
     EXPECT_EQ(Vorn::recordMachineFile(),

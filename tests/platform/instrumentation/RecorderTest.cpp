@@ -17,7 +17,7 @@ using testing::SizeIs;
 using Vorn::recordMachineFile;
 using Vorn::NodeLexicon::NodeType;
 
-TEST(Recorder, walksTemperaturesThenVoltagesThenTachometers)
+TEST(RecorderTest, WalksTemperaturesThenVoltagesThenTachometers)
 {
     const ScriptedMachine machine({{NodeType::Tachometer, "/f", "", {}},
         {NodeType::Voltage, "/v", "", {}}, {NodeType::Temperature, "/t", "", {}}});
@@ -28,7 +28,7 @@ TEST(Recorder, walksTemperaturesThenVoltagesThenTachometers)
     EXPECT_EQ(nodes[2].path, "/f");
 }
 
-TEST(Recorder, leavesOutNumbersThatAreNotFinite)
+TEST(RecorderTest, LeavesOutNumbersThatAreNotFinite)
 {
     const ScriptedMachine machine({{NodeType::Voltage, "/v", "",
         {.reading = std::numeric_limits<double>::quiet_NaN(),
@@ -40,7 +40,7 @@ TEST(Recorder, leavesOutNumbersThatAreNotFinite)
     EXPECT_EQ(nodes.at(0).values.lowerCritical, 1.5);
 }
 
-TEST(Recorder, makesPathsUnique)
+TEST(RecorderTest, MakesPathsUnique)
 {
     const ScriptedMachine machine({{NodeType::Voltage, "/v", "1", {}},
         {NodeType::Voltage, "/v", "2", {}}, {NodeType::Tachometer, "/v", "3", {}}});
@@ -51,7 +51,7 @@ TEST(Recorder, makesPathsUnique)
     EXPECT_EQ(nodes[2].path, "/v#3");
 }
 
-TEST(Recorder, makesTextsValid)
+TEST(RecorderTest, MakesTextsValid)
 {
     const ScriptedMachine machine({{NodeType::Voltage, "/\xFF", "a\xFE", {}}});
     const auto nodes = Vorn::readMachineFile(recordMachineFile());
@@ -59,7 +59,7 @@ TEST(Recorder, makesTextsValid)
     EXPECT_EQ(nodes.at(0).description, "a\xEF\xBF\xBD");
 }
 
-TEST(Recorder, passesOnTheErrorOfASource)
+TEST(RecorderTest, PassesOnTheErrorOfASource)
 {
     ScriptedMachine machine;
     machine.failConstruction();

@@ -37,7 +37,7 @@ std::vector<SeenNode> demoMachine()
     return Testing::walk();
 }
 
-TEST(Schema, hasTheMembersThatTheReaderHas)
+TEST(SchemaTest, HasTheMembersThatTheReaderHas)
 {
     const auto document = schema();
     const auto& node = document.at("$defs").at("node");
@@ -51,7 +51,7 @@ TEST(Schema, hasTheMembersThatTheReaderHas)
     EXPECT_EQ(document.at("additionalProperties"), false);
 }
 
-TEST(Schema, hasTheTypesThatTheReaderHas)
+TEST(SchemaTest, HasTheTypesThatTheReaderHas)
 {
     std::vector<std::string_view> names;
     for (const Member::TypeName& type : Member::typeNames)
@@ -60,7 +60,7 @@ TEST(Schema, hasTheTypesThatTheReaderHas)
     EXPECT_EQ(types, nlohmann::json(names));
 }
 
-TEST(Schema, numbersAreTheNumbersOfTheReader)
+TEST(SchemaTest, NumbersAreTheNumbersOfTheReader)
 {
     const auto members = schema().at("/$defs/node/properties"_json_pointer);
     for (const Member::Number& number : Member::numbers)
@@ -69,7 +69,7 @@ TEST(Schema, numbersAreTheNumbersOfTheReader)
 }
 
 // Every sensor's status is what its reading and its limits make it.
-TEST(DemoModel, isConsistent)
+TEST(DemoModelTest, IsConsistent)
 {
     for (const SeenNode& node : demoMachine()) {
         const Vorn::NodeReading& values = node.values;
@@ -88,7 +88,7 @@ TEST(DemoModel, isConsistent)
     }
 }
 
-TEST(DemoModel, showsSensorsOfEveryKindInEveryStateThatMatters)
+TEST(DemoModelTest, ShowsSensorsOfEveryKindInEveryStateThatMatters)
 {
     std::map<Vorn::NodeLexicon::NodeType, int> kinds;
     std::set<unsigned> statuses;

@@ -13,7 +13,7 @@ using Testing::errorOf;
 using testing::HasSubstr;
 using Vorn::parseSourceList;
 
-TEST(SourceList, splitsEntriesAtCommasAndArgumentsAtTheFirstColon)
+TEST(SourceListTest, SplitsEntriesAtCommasAndArgumentsAtTheFirstColon)
 {
     const auto entries = parseSourceList("hwmon,model:/srv/a:b.json");
     ASSERT_EQ(entries.size(), 2U);
@@ -25,7 +25,7 @@ TEST(SourceList, splitsEntriesAtCommasAndArgumentsAtTheFirstColon)
     EXPECT_EQ(entries[1].argument, "/srv/a:b.json");
 }
 
-TEST(SourceList, takesACommaAfterABackslashForPartOfTheName)
+TEST(SourceListTest, TakesACommaAfterABackslashForPartOfTheName)
 {
     const auto entries = parseSourceList(R"(model:/srv/a\,b\\c.json,hwmon)");
     ASSERT_EQ(entries.size(), 2U);
@@ -33,7 +33,7 @@ TEST(SourceList, takesACommaAfterABackslashForPartOfTheName)
     EXPECT_EQ(entries[1].scheme, "hwmon");
 }
 
-TEST(SourceList, readsBackEveryFileName)
+TEST(SourceListTest, ReadsBackEveryFileName)
 {
     for (const std::string name : {"/a.json", "/a,b", R"(/a\b)", R"(\,\)", "a:b", " "}) {
         const auto entries = parseSourceList(Vorn::formatSourceEntry("model", name));
@@ -43,7 +43,7 @@ TEST(SourceList, readsBackEveryFileName)
     }
 }
 
-TEST(SourceList, namesAnEntryWithoutAName)
+TEST(SourceListTest, NamesAnEntryWithoutAName)
 {
     for (const std::string list : {"", ",hwmon", "hwmon,", "hwmon,,model:x"})
         EXPECT_THAT(
@@ -51,7 +51,7 @@ TEST(SourceList, namesAnEntryWithoutAName)
     EXPECT_THAT(errorOf([] { parseSourceList("hwmon,:x"); }), HasSubstr("source \":x\""));
 }
 
-TEST(SourceList, namesAnEntryThatEndsInALoneBackslash)
+TEST(SourceListTest, NamesAnEntryThatEndsInALoneBackslash)
 {
     EXPECT_THAT(errorOf([] { parseSourceList("model:x\\"); }), HasSubstr("\"model:x\\\""));
 }

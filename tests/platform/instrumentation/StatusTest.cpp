@@ -24,9 +24,9 @@ struct Row {
     unsigned status;
 };
 
-class StatusTable : public testing::TestWithParam<Row> {};
+class StatusTableTest : public testing::TestWithParam<Row> {};
 
-TEST_P(StatusTable, givesTheStatusOfTheRow)
+TEST_P(StatusTableTest, GivesTheStatusOfTheRow)
 {
     EXPECT_EQ(statusOf(GetParam().channel), GetParam().status);
 }
@@ -72,22 +72,22 @@ const Row rows[] = {
     {"warningLowBeforePlain", {.reading = 50, .alarms = {.plain = true, .min = true}}, 22},
 };
 
-INSTANTIATE_TEST_SUITE_P(
-    EveryRow, StatusTable, testing::ValuesIn(rows), [](const auto& row) { return row.param.name; });
+INSTANTIATE_TEST_SUITE_P(EveryRow, StatusTableTest, testing::ValuesIn(rows),
+    [](const auto& row) { return row.param.name; });
 
-TEST(UnsetLimits, aPairWithBothEndsZeroIsAbsent)
+TEST(UnsetLimitsTest, APairWithBothEndsZeroIsAbsent)
 {
     const Limits limits = withoutUnset({.min = 0, .max = 0, .lcrit = 0, .crit = 0});
     EXPECT_FALSE(limits.min || limits.max || limits.lcrit || limits.crit);
 }
 
-TEST(UnsetLimits, anEndThatIsMissingCountsAsZero)
+TEST(UnsetLimitsTest, AnEndThatIsMissingCountsAsZero)
 {
     const Limits limits = withoutUnset({.min = 0, .crit = 0, .emergency = 0});
     EXPECT_FALSE(limits.min || limits.crit || limits.emergency);
 }
 
-TEST(UnsetLimits, aZeroBesideASetEndIsMeant)
+TEST(UnsetLimitsTest, AZeroBesideASetEndIsMeant)
 {
     const Limits limits = withoutUnset({.min = 0, .max = 85, .lcrit = -40, .crit = 0});
     EXPECT_EQ(limits.min, 0);
@@ -96,7 +96,7 @@ TEST(UnsetLimits, aZeroBesideASetEndIsMeant)
     EXPECT_EQ(limits.crit, 0);
 }
 
-TEST(UnsetLimits, aZeroBesideAnEndThatCannotBeReadIsMeant)
+TEST(UnsetLimitsTest, AZeroBesideAnEndThatCannotBeReadIsMeant)
 {
     constexpr double unreadable = std::numeric_limits<double>::quiet_NaN();
     const Limits limits =
@@ -106,7 +106,7 @@ TEST(UnsetLimits, aZeroBesideAnEndThatCannotBeReadIsMeant)
     EXPECT_EQ(limits.crit, 0);
 }
 
-TEST(UnsetLimits, whatCannotBeReadIsAbsent)
+TEST(UnsetLimitsTest, WhatCannotBeReadIsAbsent)
 {
     constexpr double unreadable = std::numeric_limits<double>::quiet_NaN();
     const Limits limits =
@@ -115,19 +115,19 @@ TEST(UnsetLimits, whatCannotBeReadIsAbsent)
     EXPECT_EQ(limits.crit, 95);
 }
 
-TEST(UnsetLimits, thePairsDoNotTouchEachOther)
+TEST(UnsetLimitsTest, ThePairsDoNotTouchEachOther)
 {
     const Limits limits = withoutUnset({.min = 0, .max = 0, .crit = 95});
     EXPECT_FALSE(limits.min || limits.max);
     EXPECT_EQ(limits.crit, 95);
 }
 
-TEST(PossibleStates, aChannelWithoutLimitsCanOnlyBeNormal)
+TEST(PossibleStatesTest, AChannelWithoutLimitsCanOnlyBeNormal)
 {
     EXPECT_EQ(possibleStatesOf({.reading = 1}), std::vector<unsigned>{1});
 }
 
-TEST(PossibleStates, everyLimitAddsItsState)
+TEST(PossibleStatesTest, EveryLimitAddsItsState)
 {
     EXPECT_EQ(possibleStatesOf({.limits = {.min = 1}}), (std::vector<unsigned>{1, 22}));
     EXPECT_EQ(possibleStatesOf({.limits = {.max = 1}}), (std::vector<unsigned>{1, 23}));
@@ -136,7 +136,7 @@ TEST(PossibleStates, everyLimitAddsItsState)
     EXPECT_EQ(possibleStatesOf({.limits = {.emergency = 1}}), std::vector<unsigned>{1});
 }
 
-TEST(PossibleStates, everyAlarmAddsItsStateRaisedOrNot)
+TEST(PossibleStatesTest, EveryAlarmAddsItsStateRaisedOrNot)
 {
     EXPECT_EQ(possibleStatesOf({.alarms = {.plain = false}}), (std::vector<unsigned>{1, 21}));
     EXPECT_EQ(possibleStatesOf({.alarms = {.min = true}}), (std::vector<unsigned>{1, 22}));
@@ -146,7 +146,7 @@ TEST(PossibleStates, everyAlarmAddsItsStateRaisedOrNot)
     EXPECT_EQ(possibleStatesOf({.alarms = {.emergency = false}}), (std::vector<unsigned>{1, 26}));
 }
 
-TEST(PossibleStates, aSwitchAddsDisabledAndAllStatesAscend)
+TEST(PossibleStatesTest, ASwitchAddsDisabledAndAllStatesAscend)
 {
     EXPECT_EQ(
         possibleStatesOf({.isEnabled = true, .limits = allLimits, .alarms = {.plain = false}}),

@@ -16,9 +16,9 @@ namespace FirstUseTests {
 using Testing::logLine;
 using Testing::traceLine;
 
-class FirstUse : public testing::Test {
+class FirstUseTest : public testing::Test {
 protected:
-    FirstUse() { GTEST_FLAG_SET(death_test_style, "threadsafe"); }
+    FirstUseTest() { GTEST_FLAG_SET(death_test_style, "threadsafe"); }
 };
 
 void set(const char* level, const char* log, const char* trace)
@@ -34,7 +34,7 @@ void printSyslog()
         std::fprintf(stderr, "syslog: %s\n", line.text.c_str());
 }
 
-TEST_F(FirstUse, ALineFindsTheChannelsOfTheEnvironment)
+TEST_F(FirstUseTest, ALineFindsTheChannelsOfTheEnvironment)
 {
     EXPECT_EXIT(
         {
@@ -46,7 +46,7 @@ TEST_F(FirstUse, ALineFindsTheChannelsOfTheEnvironment)
         testing::ExitedWithCode(0), "^[^ ]+Z log 4000 Nimbrel.Sensor [^ ]+ mark\n$");
 }
 
-TEST_F(FirstUse, AskingWhatIsWantedReadsTheEnvironmentToo)
+TEST_F(FirstUseTest, AskingWhatIsWantedReadsTheEnvironmentToo)
 {
     EXPECT_EXIT(
         {
@@ -58,7 +58,7 @@ TEST_F(FirstUse, AskingWhatIsWantedReadsTheEnvironmentToo)
         testing::ExitedWithCode(0), "^$");
 }
 
-TEST_F(FirstUse, BadValuesAreReportedInTheFirstLineAndTheDefaultsTaken)
+TEST_F(FirstUseTest, BadValuesAreReportedInTheFirstLineAndTheDefaultsTaken)
 {
     EXPECT_EXIT(
         {
@@ -84,7 +84,7 @@ struct LastToGo {
 };
 __attribute__((init_priority(101))) LastToGo lastToGo;
 
-TEST_F(FirstUse, ALineAfterTheEndOfTheChannelsIsLostQuietly)
+TEST_F(FirstUseTest, ALineAfterTheEndOfTheChannelsIsLostQuietly)
 {
     EXPECT_EXIT(
         {

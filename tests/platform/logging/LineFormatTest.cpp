@@ -8,19 +8,19 @@ namespace LineFormatTests {
 
 using RynLog::formatLine;
 
-TEST(LineFormat, NamesChannelLevelComponentAndPlace)
+TEST(LineFormatTest, NamesChannelLevelComponentAndPlace)
 {
     EXPECT_EQ(formatLine("log", 6000, {"setVector", "Sensor", 740}, "Nimbrel.Sensor", "some text"),
         "log 6000 Nimbrel.Sensor setVector(Sensor:740) some text");
 }
 
-TEST(LineFormat, PrintsNullTexts)
+TEST(LineFormatTest, PrintsNullTexts)
 {
     EXPECT_EQ(formatLine("trace", 3000, {nullptr, nullptr, 0}, "c", ""),
         "trace 3000 c (null)((null):0) ");
 }
 
-TEST(LineFormat, EscapesEveryTextOfALine)
+TEST(LineFormatTest, EscapesEveryTextOfALine)
 {
     EXPECT_EQ(formatLine("log", 1, {"f\n", "F\r", 2}, "c\t", "t\\\n"),
         "log 1 c\\x09 f\\n(F\\x0D:2) t\\\\\\n");

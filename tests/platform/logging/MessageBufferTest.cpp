@@ -32,7 +32,7 @@ std::string streamed(const Value& value)
 struct Opaque;
 enum Plain { PlainValue = 7 };
 
-TEST(MessageBuffer, StrYieldsOnlyTheTextSinceThePreviousStr)
+TEST(MessageBufferTest, StrYieldsOnlyTheTextSinceThePreviousStr)
 {
     RynMessageBuffer buffer;
     buffer << "one";
@@ -42,7 +42,7 @@ TEST(MessageBuffer, StrYieldsOnlyTheTextSinceThePreviousStr)
     EXPECT_EQ(buffer.str(), "two");
 }
 
-TEST(MessageBuffer, ComposesAParameterList)
+TEST(MessageBufferTest, ComposesAParameterList)
 {
     const void* const ref = nullptr;
     RynMessageBuffer buffer;
@@ -50,7 +50,7 @@ TEST(MessageBuffer, ComposesAParameterList)
     EXPECT_EQ(buffer.str(), " ref=0 isObjPath=1 rc=5");
 }
 
-TEST(MessageBuffer, PrintsPointersAsTheStreamDoes)
+TEST(MessageBufferTest, PrintsPointersAsTheStreamDoes)
 {
     int number = 0;
     const char* texts[] = {"a", nullptr};
@@ -63,14 +63,14 @@ TEST(MessageBuffer, PrintsPointersAsTheStreamDoes)
     EXPECT_EQ(buffered(static_cast<int*>(nullptr)), "0");
 }
 
-TEST(MessageBuffer, PrintsABrokerAsItsAddress)
+TEST(MessageBufferTest, PrintsABrokerAsItsAddress)
 {
     int place = 0;
     const auto* const broker = reinterpret_cast<const _CMPIBroker*>(&place);
     EXPECT_EQ(buffered(broker), streamed(static_cast<const void*>(&place)));
 }
 
-TEST(MessageBuffer, PrintsNumbersAsTheStreamDoes)
+TEST(MessageBufferTest, PrintsNumbersAsTheStreamDoes)
 {
     const auto same = [](auto value) { EXPECT_EQ(buffered(value), streamed(value)); };
     same(std::numeric_limits<std::int64_t>::min());
@@ -85,7 +85,7 @@ TEST(MessageBuffer, PrintsNumbersAsTheStreamDoes)
     same(PlainValue);
 }
 
-TEST(MessageBuffer, PrintsCharactersAndBooleansAsTheStreamDoes)
+TEST(MessageBufferTest, PrintsCharactersAndBooleansAsTheStreamDoes)
 {
     EXPECT_EQ(buffered(true), "1");
     EXPECT_EQ(buffered(false), "0");
@@ -94,7 +94,7 @@ TEST(MessageBuffer, PrintsCharactersAndBooleansAsTheStreamDoes)
     EXPECT_EQ(buffered(reinterpret_cast<const unsigned char*>("text")), "text");
 }
 
-TEST(MessageBuffer, PrintsTexts)
+TEST(MessageBufferTest, PrintsTexts)
 {
     char array[16] = "array";
     EXPECT_EQ(buffered("literal"), "literal");
@@ -104,7 +104,7 @@ TEST(MessageBuffer, PrintsTexts)
     EXPECT_EQ(buffered(std::string_view("view")), "view");
 }
 
-TEST(MessageBuffer, PrintsANullTextAsNull)
+TEST(MessageBufferTest, PrintsANullTextAsNull)
 {
     EXPECT_EQ(buffered(static_cast<const char*>(nullptr)), "(null)");
     EXPECT_EQ(buffered(static_cast<char*>(nullptr)), "(null)");
@@ -118,7 +118,7 @@ protected:
     char do_decimal_point() const override { return ','; }
 };
 
-TEST(MessageBuffer, TheGlobalLocaleChangesNothing)
+TEST(MessageBufferTest, TheGlobalLocaleChangesNothing)
 {
     const std::locale before =
         std::locale::global(std::locale(std::locale::classic(), new Grouping));

@@ -37,7 +37,7 @@ std::string utcSecond()
     return text.data();
 }
 
-TEST(FileSink, WritesTheDocumentedLine)
+TEST(FileSinkTest, WritesTheDocumentedLine)
 {
     const LogFile file;
     const ScopedConfiguration configuration({6000, file.sink(), "off"});
@@ -48,7 +48,7 @@ TEST(FileSink, WritesTheDocumentedLine)
     EXPECT_TRUE(std::regex_match(file.lines()[0], format)) << file.lines()[0];
 }
 
-TEST(FileSink, TimeIsUtcWhateverTheZone)
+TEST(FileSinkTest, TimeIsUtcWhateverTheZone)
 {
     const LogFile file;
     const ScopedConfiguration configuration({6000, file.sink(), "off"});
@@ -60,7 +60,7 @@ TEST(FileSink, TimeIsUtcWhateverTheZone)
     EXPECT_GE(after, written);
 }
 
-TEST(FileSink, TheTwoChannelsLeadWhereTheyAreToldTo)
+TEST(FileSinkTest, TheTwoChannelsLeadWhereTheyAreToldTo)
 {
     const LogFile log, trace;
     const ScopedConfiguration configuration({6000, log.sink(), trace.sink()});
@@ -70,7 +70,7 @@ TEST(FileSink, TheTwoChannelsLeadWhereTheyAreToldTo)
     EXPECT_THAT(trace.lines(), ElementsAre(HasSubstr("Z trace 6000 ")));
 }
 
-TEST(FileSink, BothChannelsMayShareAFile)
+TEST(FileSinkTest, BothChannelsMayShareAFile)
 {
     const LogFile file;
     const ScopedConfiguration configuration({6000, file.sink(), file.sink()});
@@ -81,7 +81,7 @@ TEST(FileSink, BothChannelsMayShareAFile)
         file.lines(), ElementsAre(EndsWith("first"), EndsWith("second"), EndsWith("third")));
 }
 
-TEST(FileSink, AppendsToWhatIsThere)
+TEST(FileSinkTest, AppendsToWhatIsThere)
 {
     const LogFile file;
     std::ofstream(file.path()) << "old line\n";
@@ -90,7 +90,7 @@ TEST(FileSink, AppendsToWhatIsThere)
     EXPECT_THAT(file.lines(), ElementsAre("old line", EndsWith("new line")));
 }
 
-TEST(FileSink, ALineIsOnDiskWhenTheCallReturns)
+TEST(FileSinkTest, ALineIsOnDiskWhenTheCallReturns)
 {
     const LogFile file;
     const ScopedConfiguration configuration({6000, file.sink(), "off"});
@@ -100,7 +100,7 @@ TEST(FileSink, ALineIsOnDiskWhenTheCallReturns)
     EXPECT_THAT(file.lines(), SizeIs(2));
 }
 
-TEST(FileSink, ATextCannotForgeALine)
+TEST(FileSinkTest, ATextCannotForgeALine)
 {
     const LogFile file;
     const ScopedConfiguration configuration({6000, file.sink(), "off"});
@@ -110,7 +110,7 @@ TEST(FileSink, ATextCannotForgeALine)
     EXPECT_THAT(file.lines()[0], HasSubstr("name\\n2026-11-21T"));
 }
 
-TEST(FileSink, TextIsNotTakenAsAFormat)
+TEST(FileSinkTest, TextIsNotTakenAsAFormat)
 {
     const LogFile file;
     const ScopedConfiguration configuration({6000, file.sink(), "off"});
@@ -118,7 +118,7 @@ TEST(FileSink, TextIsNotTakenAsAFormat)
     EXPECT_THAT(file.lines(), ElementsAre(EndsWith(" {} {0} %s %n %v")));
 }
 
-TEST(FileSink, LongLinesStayWhole)
+TEST(FileSinkTest, LongLinesStayWhole)
 {
     const LogFile file;
     const ScopedConfiguration configuration({6000, file.sink(), "off"});
@@ -127,7 +127,7 @@ TEST(FileSink, LongLinesStayWhole)
     EXPECT_THAT(file.lines(), ElementsAre(EndsWith(" " + text)));
 }
 
-TEST(FileSink, NullTextsAreWrittenAsNull)
+TEST(FileSinkTest, NullTextsAreWrittenAsNull)
 {
     const LogFile file;
     const ScopedConfiguration configuration({6000, file.sink(), "off"});
@@ -135,7 +135,7 @@ TEST(FileSink, NullTextsAreWrittenAsNull)
     EXPECT_THAT(file.lines(), ElementsAre(EndsWith(" log 6000  (null)((null):1) ")));
 }
 
-TEST(FileSink, APipeThatNobodyReadsIsNotWaitedFor)
+TEST(FileSinkTest, APipeThatNobodyReadsIsNotWaitedFor)
 {
     const Testing::TemporaryFolder folder;
     const std::string pipe = (folder.path() / "pipe").string();
@@ -145,7 +145,7 @@ TEST(FileSink, APipeThatNobodyReadsIsNotWaitedFor)
     EXPECT_FALSE(RynLogger::isWanted(6000));
 }
 
-TEST(StandardErrorSink, WritesTheDocumentedLine)
+TEST(StandardErrorSinkTest, WritesTheDocumentedLine)
 {
     testing::internal::CaptureStderr();
     {
@@ -159,7 +159,7 @@ TEST(StandardErrorSink, WritesTheDocumentedLine)
     EXPECT_TRUE(std::regex_match(written, format)) << written;
 }
 
-TEST(StandardErrorSink, ABrokenPipeDoesNotEndTheProcess)
+TEST(StandardErrorSinkTest, ABrokenPipeDoesNotEndTheProcess)
 {
     std::array<int, 2> ends{};
     ASSERT_EQ(::pipe(ends.data()), 0);
@@ -178,7 +178,7 @@ TEST(StandardErrorSink, ABrokenPipeDoesNotEndTheProcess)
     EXPECT_EQ(::sigismember(&pending, SIGPIPE), 0);
 }
 
-TEST(OffSink, NothingIsWantedAndNothingPrinted)
+TEST(OffSinkTest, NothingIsWantedAndNothingPrinted)
 {
     testing::internal::CaptureStderr();
     testing::internal::CaptureStdout();
@@ -191,7 +191,7 @@ TEST(OffSink, NothingIsWantedAndNothingPrinted)
     EXPECT_EQ(testing::internal::GetCapturedStdout(), "");
 }
 
-TEST(OffSink, OneOpenChannelIsEnoughToWantALine)
+TEST(OffSinkTest, OneOpenChannelIsEnoughToWantALine)
 {
     const LogFile file;
     const ScopedConfiguration configuration({3000, "off", file.sink()});
@@ -201,7 +201,7 @@ TEST(OffSink, OneOpenChannelIsEnoughToWantALine)
     EXPECT_THAT(file.lines(), ElementsAre(EndsWith("kept")));
 }
 
-TEST(Level, LinesFromTheLevelUpAreWritten)
+TEST(LevelTest, LinesFromTheLevelUpAreWritten)
 {
     const LogFile file;
     const ScopedConfiguration configuration({4000, file.sink(), file.sink()});
@@ -216,7 +216,7 @@ TEST(Level, LinesFromTheLevelUpAreWritten)
                                   HasSubstr("log 4001"), HasSubstr("trace 4001")));
 }
 
-TEST(Level, AnyLevelIsPossible)
+TEST(LevelTest, AnyLevelIsPossible)
 {
     const LogFile file;
     const ScopedConfiguration configuration({std::numeric_limits<int>::min(), file.sink(), "off"});

@@ -18,12 +18,12 @@ using Testing::takeSyslogLines;
 constexpr int daemonWarning = 3 * 8 + 4;
 constexpr int daemonDebug = 3 * 8 + 7;
 
-class SyslogSink : public testing::Test {
+class SyslogSinkTest : public testing::Test {
 protected:
-    SyslogSink() { takeSyslogLines(); }
+    SyslogSinkTest() { takeSyslogLines(); }
 };
 
-TEST_F(SyslogSink, WritesTheLineWithoutATime)
+TEST_F(SyslogSinkTest, WritesTheLineWithoutATime)
 {
     const ScopedConfiguration configuration({3000, "syslog", "off"});
     logLine("some text", 6000);
@@ -32,7 +32,7 @@ TEST_F(SyslogSink, WritesTheLineWithoutATime)
     EXPECT_EQ(lines[0].text, "log 6000 Nimbrel.Sensor setVector(Sensor:740) some text");
 }
 
-TEST_F(SyslogSink, MessagesAreWarningsAndMarksAreDebug)
+TEST_F(SyslogSinkTest, MessagesAreWarningsAndMarksAreDebug)
 {
     const ScopedConfiguration configuration({3000, "syslog", "off"});
     for (const int level : {3000, 5999, 6000, 7000})
@@ -45,7 +45,7 @@ TEST_F(SyslogSink, MessagesAreWarningsAndMarksAreDebug)
     EXPECT_EQ(lines[3].priority, daemonWarning);
 }
 
-TEST_F(SyslogSink, TextIsNotTakenAsAFormatAndIsEscaped)
+TEST_F(SyslogSinkTest, TextIsNotTakenAsAFormatAndIsEscaped)
 {
     const ScopedConfiguration configuration({6000, "syslog", "off"});
     logLine("%s%n\nforged");
@@ -54,7 +54,7 @@ TEST_F(SyslogSink, TextIsNotTakenAsAFormatAndIsEscaped)
     EXPECT_THAT(lines[0].text, testing::EndsWith(" %s%n\\nforged"));
 }
 
-TEST_F(SyslogSink, TheProcessKeepsItsOwnSyslogSettings)
+TEST_F(SyslogSinkTest, TheProcessKeepsItsOwnSyslogSettings)
 {
     const int before = Testing::syslogSettingsChanged();
     {
@@ -64,7 +64,7 @@ TEST_F(SyslogSink, TheProcessKeepsItsOwnSyslogSettings)
     EXPECT_EQ(Testing::syslogSettingsChanged(), before);
 }
 
-TEST_F(SyslogSink, AFileThatCannotBeOpenedIsReportedOnceAndItsLinesAreLost)
+TEST_F(SyslogSinkTest, AFileThatCannotBeOpenedIsReportedOnceAndItsLinesAreLost)
 {
     testing::internal::CaptureStderr();
     const ScopedConfiguration configuration({6000, "file:/nowhere\n/at all", "off"});
@@ -81,7 +81,7 @@ TEST_F(SyslogSink, AFileThatCannotBeOpenedIsReportedOnceAndItsLinesAreLost)
         AllOf(HasSubstr("/nowhere\\n/at all"), HasSubstr("No such file or directory")));
 }
 
-TEST_F(SyslogSink, AFileThatTakesNoLinesIsReportedOnce)
+TEST_F(SyslogSinkTest, AFileThatTakesNoLinesIsReportedOnce)
 {
     testing::internal::CaptureStderr();
     const ScopedConfiguration configuration({6000, "file:/dev/full", "off"});
@@ -97,14 +97,14 @@ TEST_F(SyslogSink, AFileThatTakesNoLinesIsReportedOnce)
     EXPECT_EQ(lines[0].text, problem + "; its lines are lost");
 }
 
-TEST_F(SyslogSink, AProblemWithTheSettingsDoesNotFailOnAFullDisk)
+TEST_F(SyslogSinkTest, AProblemWithTheSettingsDoesNotFailOnAFullDisk)
 {
     EXPECT_NO_THROW(
         const ScopedConfiguration configuration({6000, "file:/dev/full", "off", "a problem"}));
     EXPECT_EQ(takeSyslogLines().size(), 1U);
 }
 
-TEST_F(SyslogSink, TheOtherChannelGoesOnWhenAFileCannotBeOpened)
+TEST_F(SyslogSinkTest, TheOtherChannelGoesOnWhenAFileCannotBeOpened)
 {
     const Testing::LogFile file;
     const ScopedConfiguration configuration({6000, "file:/nowhere/at/all", file.sink()});

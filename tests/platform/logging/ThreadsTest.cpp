@@ -23,7 +23,7 @@ std::string textOf(int writer, int number)
     return std::to_string(writer) + "-" + std::to_string(number) + std::string(200, '.');
 }
 
-TEST(Threads, WriteWholeLinesAndLoseNone)
+TEST(ThreadsTest, WriteWholeLinesAndLoseNone)
 {
     const LogFile file;
     const ScopedConfiguration configuration({6000, file.sink(), file.sink()});
@@ -46,7 +46,7 @@ TEST(Threads, WriteWholeLinesAndLoseNone)
     EXPECT_EQ(found.size(), static_cast<std::size_t>(writers * linesPerWriter));
 }
 
-TEST(Threads, WriteOnWhileTheConfigurationChanges)
+TEST(ThreadsTest, WriteOnWhileTheConfigurationChanges)
 {
     const LogFile first, second;
     const ScopedConfiguration configuration({6000, first.sink(), "off"});

@@ -31,7 +31,7 @@ void loadLogAndUnload(const std::string& path)
     logOneLine(path.c_str());
 }
 
-TEST(Unload, ALibraryThatLoggedLeavesNoDescriptorAndNoMapping)
+TEST(UnloadTest, ALibraryThatLoggedLeavesNoDescriptorAndNoMapping)
 {
     const LogFile file;
     loadLogAndUnload(file.path());

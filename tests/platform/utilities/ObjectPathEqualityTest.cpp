@@ -31,7 +31,7 @@ bool equalValues(const CMPIData& a, const CMPIData& b)
     return equal(pathA.key("K", a), pathB.key("K", b));
 }
 
-TEST(ObjectPathEquality, SameClassAndKeysAreEqual)
+TEST(ObjectPathEqualityTest, SameClassAndKeysAreEqual)
 {
     FakePath a("root/cimv2", sensorClass), b("root/cimv2", sensorClass);
     a.text("DeviceID", "/board/fan1").text("SystemName", "host");
@@ -40,21 +40,21 @@ TEST(ObjectPathEquality, SameClassAndKeysAreEqual)
     EXPECT_TRUE(equal(a, a));
 }
 
-TEST(ObjectPathEquality, ClassNamesIgnoreCase)
+TEST(ObjectPathEqualityTest, ClassNamesIgnoreCase)
 {
     EXPECT_TRUE(equal({"root", "ZUMLO_NumericSensor"}, {"root", "zumlo_numericSENSOR"}));
     EXPECT_FALSE(equal({"root", "ZUMLO_NumericSensor"}, {"root", "ZUMLO_NumericSensors"}));
     EXPECT_FALSE(equal({"root", "ZUMLO[NumericSensor"}, {"root", "ZUMLO{NumericSensor"}));
 }
 
-TEST(ObjectPathEquality, APathWithoutAClassEqualsNothing)
+TEST(ObjectPathEqualityTest, APathWithoutAClassEqualsNothing)
 {
     EXPECT_FALSE(equal({"root", std::nullopt}, {"root", std::nullopt}));
     EXPECT_FALSE(equal({"root", ""}, {"root", ""}));
     EXPECT_FALSE(equal({"root", sensorClass}, {"root", std::nullopt}));
 }
 
-TEST(ObjectPathEquality, NamespacesCountWhenBothSidesHaveOne)
+TEST(ObjectPathEqualityTest, NamespacesCountWhenBothSidesHaveOne)
 {
     EXPECT_FALSE(equal({"root/cimv2", sensorClass}, {"root/interop", sensorClass}));
     EXPECT_TRUE(equal({"root/cimv2", sensorClass}, {std::nullopt, sensorClass}));
@@ -62,20 +62,20 @@ TEST(ObjectPathEquality, NamespacesCountWhenBothSidesHaveOne)
     EXPECT_TRUE(equal({std::nullopt, sensorClass}, {std::nullopt, sensorClass}));
 }
 
-TEST(ObjectPathEquality, NamespacesIgnoreCaseAndOuterSlashes)
+TEST(ObjectPathEqualityTest, NamespacesIgnoreCaseAndOuterSlashes)
 {
     EXPECT_TRUE(equal({"/root/cimv2/", sensorClass}, {"Root/CIMv2", sensorClass}));
     EXPECT_FALSE(equal({"root//cimv2", sensorClass}, {"root/cimv2", sensorClass}));
 }
 
-TEST(ObjectPathEquality, ANamespaceStringWithoutAHandleIsNone)
+TEST(ObjectPathEqualityTest, ANamespaceStringWithoutAHandleIsNone)
 {
     FakePath a("root/cimv2", sensorClass), b("root/interop", sensorClass);
     b.nameSpace.loseHandle();
     EXPECT_TRUE(equal(a, b));
 }
 
-TEST(ObjectPathEquality, HostNamesAreIgnored)
+TEST(ObjectPathEqualityTest, HostNamesAreIgnored)
 {
     FakePath a("root", sensorClass), b("root", sensorClass);
     a.hostName.text = "one";
@@ -83,7 +83,7 @@ TEST(ObjectPathEquality, HostNamesAreIgnored)
     EXPECT_TRUE(equal(a, b));
 }
 
-TEST(ObjectPathEquality, KeysMayComeInAnyOrderAndCase)
+TEST(ObjectPathEqualityTest, KeysMayComeInAnyOrderAndCase)
 {
     FakePath a("root", sensorClass), b("root", sensorClass);
     a.text("DeviceID", "1").text("SystemName", "2").text("X", "3");
@@ -91,7 +91,7 @@ TEST(ObjectPathEquality, KeysMayComeInAnyOrderAndCase)
     EXPECT_TRUE(equal(a, b));
 }
 
-TEST(ObjectPathEquality, EveryKeyCounts)
+TEST(ObjectPathEqualityTest, EveryKeyCounts)
 {
     FakePath all("root", sensorClass), some("root", sensorClass), none("root", sensorClass);
     all.text("DeviceID", "1").text("SystemName", "2");
@@ -100,13 +100,13 @@ TEST(ObjectPathEquality, EveryKeyCounts)
     EXPECT_FALSE(equal(some, none));
 }
 
-TEST(ObjectPathEquality, KeysOfDifferentNamesAreDifferent)
+TEST(ObjectPathEqualityTest, KeysOfDifferentNamesAreDifferent)
 {
     FakePath a("root", sensorClass), b("root", sensorClass);
     EXPECT_FALSE(equal(a.text("DeviceID", "1"), b.text("DeviceIDs", "1")));
 }
 
-TEST(ObjectPathEquality, ANameListedTwiceDoesNotStandForAnother)
+TEST(ObjectPathEqualityTest, ANameListedTwiceDoesNotStandForAnother)
 {
     FakePath a("root", sensorClass), b("root", sensorClass);
     a.text("K", "1").text("K", "1");
@@ -114,7 +114,7 @@ TEST(ObjectPathEquality, ANameListedTwiceDoesNotStandForAnother)
     EXPECT_FALSE(equal(a, b));
 }
 
-TEST(ObjectPathEquality, TextsAreComparedCharacterByCharacter)
+TEST(ObjectPathEqualityTest, TextsAreComparedCharacterByCharacter)
 {
     FakePath a("root", sensorClass), b("root", sensorClass), c("root", sensorClass);
     a.text("DeviceID", "fan1");
@@ -122,7 +122,7 @@ TEST(ObjectPathEquality, TextsAreComparedCharacterByCharacter)
     EXPECT_FALSE(equal(a, c.text("DeviceID", "fan1 ")));
 }
 
-TEST(ObjectPathEquality, BothFormsOfATextAreEqual)
+TEST(ObjectPathEqualityTest, BothFormsOfATextAreEqual)
 {
     FakePath a("root", sensorClass), b("root", sensorClass), c("root", sensorClass);
     a.text("DeviceID", "fan1");
@@ -130,7 +130,7 @@ TEST(ObjectPathEquality, BothFormsOfATextAreEqual)
     EXPECT_FALSE(equal(a, c.chars("DeviceID", "fan2")));
 }
 
-TEST(ObjectPathEquality, IntegersOfAnyTypeAreComparedByValue)
+TEST(ObjectPathEqualityTest, IntegersOfAnyTypeAreComparedByValue)
 {
     const auto five = signedInteger(CMPI_sint64, 5);
     for (const auto type :
@@ -146,13 +146,13 @@ TEST(ObjectPathEquality, IntegersOfAnyTypeAreComparedByValue)
     }
 }
 
-TEST(ObjectPathEquality, ANegativeIntegerIsNotTheLargePositiveOfTheSameBits)
+TEST(ObjectPathEqualityTest, ANegativeIntegerIsNotTheLargePositiveOfTheSameBits)
 {
     EXPECT_FALSE(equalValues(signedInteger(CMPI_sint64, -1),
         unsignedInteger(CMPI_uint64, std::numeric_limits<CMPIUint64>::max())));
 }
 
-TEST(ObjectPathEquality, BooleansRealsAndCharactersAreComparedByValue)
+TEST(ObjectPathEqualityTest, BooleansRealsAndCharactersAreComparedByValue)
 {
     EXPECT_TRUE(equalValues(boolean(true), boolean(true)));
     EXPECT_FALSE(equalValues(boolean(true), boolean(false)));
@@ -163,14 +163,14 @@ TEST(ObjectPathEquality, BooleansRealsAndCharactersAreComparedByValue)
     EXPECT_FALSE(equalValues(character(0x30BB), character(0x30BC)));
 }
 
-TEST(ObjectPathEquality, ABooleanIsTrueWhateverItsBits)
+TEST(ObjectPathEqualityTest, ABooleanIsTrueWhateverItsBits)
 {
     CMPIData odd = boolean(true);
     odd.value.boolean = 2;
     EXPECT_TRUE(equalValues(odd, boolean(true)));
 }
 
-TEST(ObjectPathEquality, ValuesOfDifferentTypesAreDifferent)
+TEST(ObjectPathEqualityTest, ValuesOfDifferentTypesAreDifferent)
 {
     const std::vector<CMPIData> ones = {
         boolean(true), unsignedInteger(CMPI_uint32, 1), real(CMPI_real64, 1), character(1)};
@@ -181,7 +181,7 @@ TEST(ObjectPathEquality, ValuesOfDifferentTypesAreDifferent)
     EXPECT_FALSE(equal(number.key("K", ones[1]), text.text("K", "1")));
 }
 
-TEST(ObjectPathEquality, PointsInTimeAreComparedByTheirStandardForm)
+TEST(ObjectPathEqualityTest, PointsInTimeAreComparedByTheirStandardForm)
 {
     const auto noon = "20261121120000.000000+000";
     FakePath a("root", sensorClass), b("root", sensorClass), c("root", sensorClass);
@@ -190,7 +190,7 @@ TEST(ObjectPathEquality, PointsInTimeAreComparedByTheirStandardForm)
     EXPECT_FALSE(equal(a, c.dateTime("K", "20261121120001.000000+000")));
 }
 
-TEST(ObjectPathEquality, NullAndHandlelessPathsEqualNothing)
+TEST(ObjectPathEqualityTest, NullAndHandlelessPathsEqualNothing)
 {
     FakePath whole("root", sensorClass), broken("root", sensorClass);
     broken.loseHandle();
@@ -201,7 +201,7 @@ TEST(ObjectPathEquality, NullAndHandlelessPathsEqualNothing)
     EXPECT_FALSE(equal(broken, broken));
 }
 
-TEST(ObjectPathEquality, KeysWithoutAValueCountAsNotThere)
+TEST(ObjectPathEqualityTest, KeysWithoutAValueCountAsNotThere)
 {
     const std::vector<CMPIValueState> states = {
         CMPI_nullValue, CMPI_notFound, CMPI_nullValue | CMPI_notFound};
@@ -215,7 +215,7 @@ TEST(ObjectPathEquality, KeysWithoutAValueCountAsNotThere)
     }
 }
 
-TEST(ObjectPathEquality, KeysWithEmptyPointersCountAsNotThere)
+TEST(ObjectPathEqualityTest, KeysWithEmptyPointersCountAsNotThere)
 {
     FakePath a("root", sensorClass), b("root", sensorClass);
     a.text("DeviceID", "1");
@@ -228,14 +228,14 @@ TEST(ObjectPathEquality, KeysWithEmptyPointersCountAsNotThere)
     EXPECT_FALSE(equal(a, FakePath("root", sensorClass).text("DeviceID", std::nullopt)));
 }
 
-TEST(ObjectPathEquality, BadValuesEqualNothing)
+TEST(ObjectPathEqualityTest, BadValuesEqualNothing)
 {
     const auto bad = poisoned(CMPI_string, CMPI_badValue);
     EXPECT_FALSE(equalValues(bad, bad));
     EXPECT_FALSE(equalValues(bad, boolean(true)));
 }
 
-TEST(ObjectPathEquality, TypesThatNoKeyCanHaveEqualNothing)
+TEST(ObjectPathEqualityTest, TypesThatNoKeyCanHaveEqualNothing)
 {
     for (const auto type :
         std::vector<CMPIType>{CMPI_stringA, CMPI_instance, CMPI_null, CMPI_ptr}) {
@@ -244,7 +244,7 @@ TEST(ObjectPathEquality, TypesThatNoKeyCanHaveEqualNothing)
     }
 }
 
-TEST(ObjectPathEquality, ABrokerThatFailsToListKeysMakesPathsUnequal)
+TEST(ObjectPathEqualityTest, ABrokerThatFailsToListKeysMakesPathsUnequal)
 {
     FakePath whole("root", sensorClass);
     whole.text("A", "1").text("B", "2");
@@ -263,7 +263,7 @@ TEST(ObjectPathEquality, ABrokerThatFailsToListKeysMakesPathsUnequal)
     unequalWhen([](FakePath& path) { path.keys[1].name.outcome = CMPI_RC_ERR_FAILED; });
 }
 
-class References : public testing::Test {
+class ReferencesTest : public testing::Test {
 protected:
     FakePath fan1{"root", sensorClass};
     FakePath fan2{"root", sensorClass};
@@ -271,7 +271,7 @@ protected:
     FakePath a{"root", "ZUMLO_SensorSystemDevice"};
     FakePath b{"root", "ZUMLO_SensorSystemDevice"};
 
-    References()
+    ReferencesTest()
     {
         fan1.text("DeviceID", "fan1");
         fan2.text("DeviceID", "fan2");
@@ -279,21 +279,21 @@ protected:
     }
 };
 
-TEST_F(References, AreComparedAsPathsByTheSameRule)
+TEST_F(ReferencesTest, AreComparedAsPathsByTheSameRule)
 {
     a.reference("PartComponent", fan1.get());
     b.reference("partcomponent", fan1Again.get());
     EXPECT_TRUE(equal(a, b, true));
 }
 
-TEST_F(References, ToDifferentPathsAreDifferent)
+TEST_F(ReferencesTest, ToDifferentPathsAreDifferent)
 {
     a.reference("PartComponent", fan1.get());
     b.reference("PartComponent", fan2.get());
     EXPECT_FALSE(equal(a, b, true));
 }
 
-TEST_F(References, DoNotCountWhenTheyAreNotCompared)
+TEST_F(ReferencesTest, DoNotCountWhenTheyAreNotCompared)
 {
     a.text("K", "1").reference("PartComponent", fan1.get());
     b.text("K", "1").reference("PartComponent", fan2.get());
@@ -303,20 +303,20 @@ TEST_F(References, DoNotCountWhenTheyAreNotCompared)
     EXPECT_FALSE(equal(a, none, true));
 }
 
-TEST_F(References, AreNotFollowedWhenTheyAreNotCompared)
+TEST_F(ReferencesTest, AreNotFollowedWhenTheyAreNotCompared)
 {
     a.key("PartComponent", poisoned(CMPI_ref, CMPI_goodValue));
     EXPECT_TRUE(equal(a, b, false));
 }
 
-TEST_F(References, AreNotTexts)
+TEST_F(ReferencesTest, AreNotTexts)
 {
     a.reference("PartComponent", fan1.get());
     b.text("PartComponent", "ZUMLO_NumericSensor.DeviceID=\"fan1\"");
     EXPECT_FALSE(equal(a, b, true));
 }
 
-TEST_F(References, ToHandlelessPathsEqualNothing)
+TEST_F(ReferencesTest, ToHandlelessPathsEqualNothing)
 {
     fan1.loseHandle();
     a.reference("PartComponent", fan1.get());
@@ -336,13 +336,13 @@ bool equalChains(int references)
     return equal(chain.back(), chain.back(), true);
 }
 
-TEST_F(References, AreFollowedToABoundedDepth)
+TEST_F(ReferencesTest, AreFollowedToABoundedDepth)
 {
     EXPECT_TRUE(equalChains(8));
     EXPECT_FALSE(equalChains(9));
 }
 
-TEST_F(References, InACircleComeToAnEnd)
+TEST_F(ReferencesTest, InACircleComeToAnEnd)
 {
     a.reference("Next", a.get());
     EXPECT_FALSE(equal(a, a, true));

@@ -10,7 +10,7 @@ namespace {
 
 using Vorn::stripSpaces;
 
-TEST(SystemName, IsTheKernelsHostName)
+TEST(SystemNameTest, IsTheKernelsHostName)
 {
     std::ifstream kernel("/proc/sys/kernel/hostname");
     std::string name;
@@ -19,20 +19,20 @@ TEST(SystemName, IsTheKernelsHostName)
     EXPECT_NE(name, "");
 }
 
-TEST(StripSpaces, TakesBlanksFromBothEnds)
+TEST(StripSpacesTest, TakesBlanksFromBothEnds)
 {
     EXPECT_EQ(stripSpaces("  CPU 1 Temp "), "CPU 1 Temp");
     EXPECT_EQ(stripSpaces("\t CPU\t"), "CPU");
 }
 
-TEST(StripSpaces, LeavesBlanksWithinAndOtherCharacters)
+TEST(StripSpacesTest, LeavesBlanksWithinAndOtherCharacters)
 {
     EXPECT_EQ(stripSpaces("a  b\tc"), "a  b\tc");
     EXPECT_EQ(stripSpaces("\na\n"), "\na\n");
     EXPECT_EQ(stripSpaces("plain"), "plain");
 }
 
-TEST(StripSpaces, NothingIsLeftOfBlanks)
+TEST(StripSpacesTest, NothingIsLeftOfBlanks)
 {
     EXPECT_EQ(stripSpaces(""), "");
     EXPECT_EQ(stripSpaces(" "), "");

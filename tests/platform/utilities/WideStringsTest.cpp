@@ -10,7 +10,7 @@ using namespace std::string_literals;
 using Vorn::make_string;
 using Vorn::make_wstring;
 
-TEST(WideStrings, ConvertEveryLengthOfSequence)
+TEST(WideStringsTest, ConvertEveryLengthOfSequence)
 {
     const std::string narrow = "a\xC3\xBC\xE3\x82\xBB\xF0\x9F\x8C\xA1";
     const std::wstring wide = L"a\u00FC\u30BB\U0001F321";
@@ -18,13 +18,13 @@ TEST(WideStrings, ConvertEveryLengthOfSequence)
     EXPECT_EQ(make_string(wide), narrow);
 }
 
-TEST(WideStrings, KeepTheFirstAndTheLastOfEachLength)
+TEST(WideStringsTest, KeepTheFirstAndTheLastOfEachLength)
 {
     const std::wstring bounds = L"\u007F\u0080\u07FF\u0800\uD7FF\uE000\uFFFF\U00010000\U0010FFFF"s;
     EXPECT_EQ(make_wstring(make_string(bounds)), bounds);
 }
 
-TEST(WideStrings, KeepZeroCharactersAndEmptyTexts)
+TEST(WideStringsTest, KeepZeroCharactersAndEmptyTexts)
 {
     EXPECT_EQ(make_wstring("a\0b"s), L"a\0b"s);
     EXPECT_EQ(make_string(L"a\0b"s), "a\0b"s);
@@ -32,12 +32,12 @@ TEST(WideStrings, KeepZeroCharactersAndEmptyTexts)
     EXPECT_EQ(make_string(L""), "");
 }
 
-TEST(WideStrings, ReplaceBytesThatBelongToNoCharacter)
+TEST(WideStringsTest, ReplaceBytesThatBelongToNoCharacter)
 {
     EXPECT_EQ(make_wstring("a\xFF!\xE3\x82!"), L"a\uFFFD!\uFFFD\uFFFD!");
 }
 
-TEST(WideStrings, ReplaceWideCharactersThatAreNoCodePoints)
+TEST(WideStringsTest, ReplaceWideCharactersThatAreNoCodePoints)
 {
     const std::wstring invalid = {static_cast<wchar_t>(0xD800), static_cast<wchar_t>(0xDFFF),
         static_cast<wchar_t>(0x110000), static_cast<wchar_t>(-1)};
