@@ -14,7 +14,7 @@ build_packages=(
 
 check_packages=(
   "${build_packages[@]}"
-  clang libclang-rt-14-dev
+  clang clang-format clang-tidy libclang-rt-14-dev
   libgmock-dev libgtest-dev
   binutils lm-sensors locales util-linux
   openssl sblim-wbemcli
