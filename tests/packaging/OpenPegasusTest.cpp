@@ -18,7 +18,7 @@ namespace fs = std::filesystem;
 
 class OpenPegasusTest : public RegisterTest {
 protected:
-    OpenPegasus() : RegisterTest({"cimmof", "cimprovider"}) {}
+    OpenPegasusTest() : RegisterTest({"cimmof", "cimprovider"}) {}
 
     Lines modules() const { return linesOf(contentOf(path("modules"))); }
 
@@ -191,7 +191,7 @@ TEST_F(OpenPegasusTest, AServerThatDoesNotAnswerIsAFailureBeforeAnyStep)
     }
 }
 
-class EveryRegistrationStepOfOpenPegasusTest : public EveryStepOf<OpenPegasus> {};
+class EveryRegistrationStepOfOpenPegasusTest : public EveryStepOf<OpenPegasusTest> {};
 
 TEST_P(EveryRegistrationStepOfOpenPegasusTest, CanFailAndBeUndone)
 {
@@ -216,7 +216,7 @@ TEST_P(EveryRegistrationStepOfOpenPegasusTest, CanFailAndBeUndone)
 INSTANTIATE_TEST_SUITE_P(
     Steps, EveryRegistrationStepOfOpenPegasusTest, testing::Range<std::size_t>(0, 7));
 
-class EveryRemovalStepOfOpenPegasusTest : public EveryStepOf<OpenPegasus> {};
+class EveryRemovalStepOfOpenPegasusTest : public EveryStepOf<OpenPegasusTest> {};
 
 TEST_P(EveryRemovalStepOfOpenPegasusTest, CanFailAndBeRepeated)
 {

@@ -12,7 +12,7 @@ using namespace Testing;
 
 class WithoutObjectManagerTest : public RegisterTest {
 protected:
-    WithoutObjectManager() : RegisterTest({"cimmof", "sfcbrepos"}) {}
+    WithoutObjectManagerTest() : RegisterTest({"cimmof", "sfcbrepos"}) {}
 
     void expectRefusal(const Lines& arguments, int code, const std::string& reason) const
     {
@@ -68,7 +68,7 @@ TEST_F(WithoutObjectManagerTest, ExplainsItself)
 
 class BothObjectManagersTest : public RegisterTest {
 protected:
-    BothObjectManagers() : RegisterTest({"cimmof", "cimprovider", "sfcbstage", "sfcbrepos"}) {}
+    BothObjectManagersTest() : RegisterTest({"cimmof", "cimprovider", "sfcbstage", "sfcbrepos"}) {}
 };
 
 TEST_F(BothObjectManagersTest, MustBeChosenFrom)

@@ -19,7 +19,7 @@ namespace fs = std::filesystem;
 
 class SfcbTest : public RegisterTest {
 protected:
-    Sfcb() : RegisterTest({"sfcbstage", "sfcbrepos"}) {}
+    SfcbTest() : RegisterTest({"sfcbstage", "sfcbrepos"}) {}
 
     static constexpr std::size_t callsBeforeSteps = 0;
 
@@ -236,7 +236,7 @@ TEST_F(SfcbTest, DryRunCanBeFollowed)
     EXPECT_EQ(links(), linked);
 }
 
-class EveryFirstStepOfSfcbTest : public EveryStepOf<Sfcb> {};
+class EveryFirstStepOfSfcbTest : public EveryStepOf<SfcbTest> {};
 
 TEST_P(EveryFirstStepOfSfcbTest, CanFailAndBeUndone)
 {
@@ -253,7 +253,7 @@ TEST_P(EveryFirstStepOfSfcbTest, CanFailAndBeUndone)
 
 INSTANTIATE_TEST_SUITE_P(Steps, EveryFirstStepOfSfcbTest, testing::Range<std::size_t>(0, 5));
 
-class EveryMovingStepOfSfcbTest : public EveryStepOf<Sfcb> {};
+class EveryMovingStepOfSfcbTest : public EveryStepOf<SfcbTest> {};
 
 TEST_P(EveryMovingStepOfSfcbTest, CanFailAndLeadBack)
 {
@@ -273,9 +273,9 @@ TEST_P(EveryMovingStepOfSfcbTest, CanFailAndLeadBack)
 
 INSTANTIATE_TEST_SUITE_P(Steps, EveryMovingStepOfSfcbTest, testing::Range<std::size_t>(0, 5));
 
-class EveryRemovalStepOfSfcbTest : public EveryStepOf<Sfcb> {
+class EveryRemovalStepOfSfcbTest : public EveryStepOf<SfcbTest> {
 protected:
-    EveryRemovalStepOfSfcb() { mustRun({"register", "--namespace", "root/s"}); }
+    EveryRemovalStepOfSfcbTest() { mustRun({"register", "--namespace", "root/s"}); }
 
     std::string failingRemoval()
     {
