@@ -10,6 +10,7 @@
 
 #include <cmath>
 #include <map>
+#include <tuple>
 
 namespace {
 
@@ -18,7 +19,7 @@ using namespace Testing;
 
 // One channel as `sensors -j` shows it: subfeatures by the part of their name after "temp1_".
 struct Channel {
-    std::string kind; // "temp", "in" or "fan"; else not a sensor of ours
+    std::string label;
     std::map<std::string, double> values;
 
     bool isSet(const std::string& subfeature) const
@@ -28,17 +29,24 @@ struct Channel {
     }
 };
 
-Channel channelOf(const json& subfeatures)
+// Without what a machine does not have: the reading of a channel that is faulty, and limits of
+// which nobody set either end.
+Channel channelOf(const std::string& label, const json& subfeatures)
 {
-    Channel channel;
-    for (const auto& [name, value] : subfeatures.items()) {
-        channel.kind = name.substr(0, name.find_first_of("0123456789"));
+    Channel channel{label, {}};
+    for (const auto& [name, value] : subfeatures.items())
         channel.values[name.substr(name.find('_') + 1)] = value.get<double>();
-    }
+    if (channel.isSet("fault"))
+        channel.values.erase("input");
+    for (const auto& [lower, upper] : {std::pair("min", "max"), {"lcrit", "crit"}})
+        if (!channel.isSet(lower) && !channel.isSet(upper)) {
+            channel.values.erase(lower);
+            channel.values.erase(upper);
+        }
     return channel;
 }
 
-// The readable channels by chip and label.
+// The channels of the kinds that are sensors, by the path of their node.
 std::map<std::string, Channel> channels()
 {
     const Ended ended = run({"-j"}, {.program = "/usr/bin/sensors"});
@@ -47,23 +55,24 @@ std::map<std::string, Channel> channels()
     const json document = json::parse(ended.out);
     for (const auto& [chip, features] : document.items())
         for (const auto& [label, subfeatures] : features.items()) {
-            if (label == "Adapter")
+            if (label == "Adapter" || subfeatures.empty())
                 continue;
-            const Channel channel = channelOf(subfeatures);
-            if (channel.kind == "temp" || channel.kind == "in" || channel.kind == "fan")
-                found[chip + "/" + label] = channel;
+            const std::string name = subfeatures.begin().key();
+            const std::string kind = name.substr(0, name.find_first_of("0123456789"));
+            if (kind == "temp" || kind == "in" || kind == "fan")
+                found["/hwmon/" + chip + "/" + name.substr(0, name.find('_'))] =
+                    channelOf(label, subfeatures);
         }
     return found;
 }
 
-// The same key for an instance, whose DeviceID is "<label>:/hwmon/<chip>/<feature>".
-std::string keyOf(const json& properties)
+std::map<std::string, json> recordedNodes()
 {
-    const std::string label = properties.at("ElementName");
-    const std::string id = properties.at("DeviceID");
-    const std::string path = id.substr(label.size() + 1);
-    const std::size_t chip = std::string("/hwmon/").size();
-    return path.substr(chip, path.rfind('/') - chip) + "/" + label;
+    std::map<std::string, json> found;
+    const json document = json::parse(run({"record"}).out);
+    for (const json& node : document.at("nodes"))
+        found[node.at("path")] = node;
+    return found;
 }
 
 std::map<std::string, json> listedSensors()
@@ -73,53 +82,83 @@ std::map<std::string, json> listedSensors()
     std::map<std::string, json> found;
     const json document = json::parse(ended.out);
     for (const json& instance : document.at("instances"))
-        found[keyOf(instance.at("properties"))] = instance.at("properties");
+        found[instance.at("properties").at("DeviceID")] = instance.at("properties");
     return found;
 }
 
-// Readings are cut to whole units of 10^UnitModifier, `sensors` rounds to three decimals.
-void expectSame(
-    const json& properties, const char* property, const Channel& channel, const char* subfeature)
+struct Value {
+    const char* subfeature;
+    const char* member;
+    const char* property;
+};
+
+constexpr Value values[] = {{"input", "reading", "CurrentReading"},
+    {"min", "lowerNonCritical", "LowerThresholdNonCritical"},
+    {"max", "upperNonCritical", "UpperThresholdNonCritical"},
+    {"lcrit", "lowerCritical", "LowerThresholdCritical"},
+    {"crit", "upperCritical", "UpperThresholdCritical"},
+    {"emergency", "upperFatal", "UpperThresholdFatal"}};
+
+// Nodes are exact; the properties of instances are cut to whole units of 10^UnitModifier.
+void expectSame(const json& node, const json& properties, const Channel& channel)
 {
+    constexpr double printedDigits = 0.0005;
     const double unit = std::pow(10.0, properties.at("UnitModifier").get<int>());
-    const auto theirs = channel.values.find(subfeature);
-    const double expected = theirs == channel.values.end() ? 0 : theirs->second;
-    const double published = properties.value(property, 0) * unit;
-    EXPECT_LT(std::abs(published - expected), unit * 1.01)
-        << properties.at("DeviceID") << ' ' << property;
-}
-
-void expectSame(const json& properties, const Channel& channel)
-{
-    const bool isRead = channel.values.contains("input") && !channel.isSet("fault");
-    EXPECT_EQ(properties.at("OperationalStatus") == json({13}), !isRead)
-        << properties.at("DeviceID");
-    if (isRead)
-        expectSame(properties, "CurrentReading", channel, "input");
-    expectSame(properties, "LowerThresholdNonCritical", channel, "min");
-    expectSame(properties, "UpperThresholdNonCritical", channel, "max");
-    expectSame(properties, "LowerThresholdCritical", channel, "lcrit");
-    expectSame(properties, "UpperThresholdCritical", channel, "crit");
-    expectSame(properties, "UpperThresholdFatal", channel, "emergency");
-}
-
-class HwmonTest : public MountNamespaceTest, public testing::WithParamInterface<const char*> {};
-
-TEST_P(HwmonTest, ListShowsWhatTheSensorsProgramReads)
-{
-    const BoundSysfs sysfs(GetParam());
-    const auto theirs = channels();
-    const auto ours = listedSensors();
-    ASSERT_FALSE(theirs.empty());
-    for (const auto& [key, channel] : theirs) {
-        ASSERT_TRUE(ours.contains(key)) << key;
-        expectSame(ours.at(key), channel);
+    for (const Value& value : values) {
+        const auto theirs = channel.values.find(value.subfeature);
+        const bool isThere = theirs != channel.values.end();
+        EXPECT_EQ(node.contains(value.member), isThere) << node << ' ' << value.member;
+        const double expected = isThere ? theirs->second : 0;
+        EXPECT_NEAR(node.value(value.member, 0.0), expected, printedDigits) << node;
+        EXPECT_NEAR(properties.value(value.property, 0) * unit, expected, unit * 1.01)
+            << node << ' ' << value.property;
     }
-    for (const auto& [key, properties] : ours) {
-        if (theirs.contains(key))
-            continue;
-        // `sensors` leaves out what it cannot read at all.
-        EXPECT_EQ(properties.at("OperationalStatus"), json({13})) << key;
+    EXPECT_FALSE(node.contains("lowerFatal")) << node;
+    const bool isLost = !channel.values.contains("input");
+    EXPECT_EQ(node.at("status") == 13, isLost) << node;
+    EXPECT_EQ(properties.at("OperationalStatus") == json({13}), isLost) << node;
+}
+
+// A machine and the administrator's configuration of libsensors.
+class HwmonTest : public MountNamespaceTest,
+                  public testing::WithParamInterface<std::tuple<const char*, bool>> {
+protected:
+    void SetUp() override
+    {
+        MountNamespaceTest::SetUp();
+        if (IsSkipped() || HasFailure())
+            return;
+        const auto& [machine, isConfigured] = GetParam();
+        sysfs_.emplace(machine);
+        configuration_.emplace(isConfigured ? "chip \"*-*\"\n"
+                                              "  label temp1 \"First\"\n"
+                                              "  label fan1 \"Front fan\"\n"
+                                              "  compute temp1 @*2-1.5, (@+1.5)/2\n"
+                                              "  compute in0 @*(1+10/3.3), @/(1+10/3.3)\n"
+                                              "  ignore temp2\n"
+                                              "  ignore fan2\n"
+                                            : "");
+    }
+
+private:
+    std::optional<BoundSysfs> sysfs_;
+    std::optional<BoundSensorsConfiguration> configuration_;
+};
+
+TEST_P(HwmonTest, ShowsWhatTheSensorsProgramReads)
+{
+    const auto theirs = channels();
+    const auto nodes = recordedNodes();
+    const auto instances = listedSensors();
+    EXPECT_GT(theirs.size(), 2U);
+    EXPECT_EQ(nodes.size(), theirs.size());
+    EXPECT_EQ(instances.size(), theirs.size());
+    for (const auto& [path, channel] : theirs) {
+        ASSERT_TRUE(nodes.contains(path)) << path;
+        EXPECT_EQ(nodes.at(path).at("description"), channel.label);
+        const std::string id = channel.label + ":" + path;
+        ASSERT_TRUE(instances.contains(id)) << id;
+        expectSame(nodes.at(path), instances.at(id), channel);
     }
 }
 
@@ -127,14 +166,17 @@ TEST_P(HwmonTest, RecordReplaysToTheSameOutput)
 {
     const TemporaryFolder folder;
     const std::string file = (folder.path() / "record.json").string();
-    const BoundSysfs sysfs(GetParam());
     ASSERT_EQ(run({"record", "-o", file}).code, 0);
     EXPECT_EQ(run({"list", "--json", "--model", file}).out, run({"list", "--json"}).out);
     EXPECT_EQ(run({"list", "--model", file}).out, run({"list"}).out);
 }
 
-INSTANTIATE_TEST_SUITE_P(Machines, HwmonTest, testing::Values("desktop", "server"),
-    [](const auto& machine) { return machine.param; });
+INSTANTIATE_TEST_SUITE_P(Machines, HwmonTest,
+    testing::Combine(testing::Values("desktop", "server", "hotplug"), testing::Bool()),
+    [](const auto& machine) {
+        return std::get<0>(machine.param) +
+               std::string(std::get<1>(machine.param) ? "Configured" : "");
+    });
 
 class HwmonAbsentTest : public MountNamespaceTest {};
 
@@ -152,8 +194,8 @@ TEST_F(HwmonAbsentTest, SensorsConfigurationIsHonoured)
     const BoundSensorsConfiguration configuration(
         "chip \"nct6798-*\"\n  label fan1 \"Front fan\"\n  ignore fan2\n");
     const auto sensors = listedSensors();
-    EXPECT_TRUE(sensors.contains("nct6798-isa-0290/Front fan"));
-    EXPECT_FALSE(sensors.contains("nct6798-isa-0290/fan2"));
+    EXPECT_TRUE(sensors.contains("Front fan:/hwmon/nct6798-isa-0290/fan1"));
+    EXPECT_FALSE(sensors.contains("fan2:/hwmon/nct6798-isa-0290/fan2"));
 }
 
 } // namespace

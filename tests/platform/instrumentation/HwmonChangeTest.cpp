@@ -2,9 +2,7 @@
 
 // Chips that come and go, and a configuration that changes, while somebody is reading.
 
-#include "platform/instrumentation/Recorder.h"
 #include "platform/instrumentation/hwmon/HwmonSource.h"
-#include "platform/instrumentation/machinefile/MachineFileReader.h"
 #include "tests/platform/instrumentation/HwmonMachine.h"
 
 #include <gmock/gmock.h>
@@ -123,23 +121,6 @@ TEST_F(HwmonChangeTest, TwoCursorsOnOneThreadDoNotBlockEachOther)
     second.selectNode(NodeType::Temperature);
     EXPECT_EQ(first.getNodeStatus(), 1U);
     EXPECT_EQ(second.getNodeStatus(), 1U);
-}
-
-TEST_F(HwmonChangeTest, ARecordedMachineReplaysToTheSameNodes)
-{
-    for (const std::string tree : {"desktop", "server", "hotplug"}) {
-        const BoundSysfs sysfs(tree);
-        const auto nodes = walk();
-        const auto recorded = Vorn::readMachineFile(Vorn::recordMachineFile());
-        ASSERT_EQ(recorded.size(), nodes.size());
-        for (std::size_t at = 0; at < nodes.size(); ++at) {
-            EXPECT_EQ(recorded[at].path, nodes[at].path);
-            EXPECT_EQ(recorded[at].description, nodes[at].description);
-            EXPECT_EQ(recorded[at].type, nodes[at].type);
-            EXPECT_EQ(recorded[at].sensorType, nodes[at].sensorType);
-            EXPECT_EQ(recorded[at].values, nodes[at].values);
-        }
-    }
 }
 
 // What the tree says; a lost node shows no reading.
