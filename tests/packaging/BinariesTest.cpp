@@ -23,14 +23,9 @@ using namespace Testing;
 constexpr const char* sensorLibrary = "lib/cmpi/libSensorProfileProvider.so";
 constexpr const char* systemLibrary = "lib/cmpi/libComputerSystemProvider.so";
 
-std::string fileOf(const std::string& name)
-{
-    return (movedInstallation() / name).string();
-}
-
 std::string readelf(const std::string& options, const std::string& name)
 {
-    return outputOf("readelf --wide " + options + " '" + fileOf(name) + "'");
+    return outputOf("readelf --wide " + options + " '" + installedFile(name) + "'");
 }
 
 // Without the version of their interface, such as libfmt.
@@ -48,7 +43,7 @@ class InstalledBinaryTest : public testing::TestWithParam<const char*> {};
 
 TEST_P(InstalledBinaryTest, HasAllTheLibrariesItNeeds)
 {
-    const std::string libraries = outputOf("ldd '" + fileOf(GetParam()) + "' 2>&1");
+    const std::string libraries = outputOf("ldd '" + installedFile(GetParam()) + "' 2>&1");
     EXPECT_THAT(libraries, HasSubstr("libc.so"));
     EXPECT_THAT(libraries, Not(HasSubstr("not found")));
 }
@@ -84,14 +79,14 @@ INSTANTIATE_TEST_SUITE_P(InstalledBinaries, InstalledBinaryTest,
 
 TEST(InstalledLibraryTest, ExportsItsFactoriesAndNothingElse)
 {
-    EXPECT_THAT(exportedNames(fileOf(sensorLibrary)),
+    EXPECT_THAT(exportedNames(installedFile(sensorLibrary)),
         UnorderedElementsAre("SensorProfileProvider_Create_InstanceMI",
             "SensorEnabledLogicalElementCapabilitiesProvider_Create_InstanceMI",
             "SensorElementCapabilitiesProvider_Create_InstanceMI",
             "SensorElementCapabilitiesProvider_Create_AssociationMI",
             "SensorSystemDeviceProvider_Create_InstanceMI",
             "SensorSystemDeviceProvider_Create_AssociationMI"));
-    EXPECT_THAT(exportedNames(fileOf(systemLibrary)),
+    EXPECT_THAT(exportedNames(installedFile(systemLibrary)),
         UnorderedElementsAre("ComputerSystemProvider_Create_InstanceMI"));
 }
 

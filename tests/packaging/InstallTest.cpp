@@ -19,14 +19,9 @@ using testing::Not;
 using namespace Testing;
 namespace fs = std::filesystem;
 
-std::string fileOf(const std::string& name)
-{
-    return (movedInstallation() / name).string();
-}
-
 RunOptions installedTool(std::map<std::string, std::string> environment = {})
 {
-    return {.program = fileOf("bin/sensorctl"), .environment = std::move(environment)};
+    return {.program = installedFile("bin/sensorctl"), .environment = std::move(environment)};
 }
 
 const std::vector<std::string> providerFiles = {"lib/cmpi/libComputerSystemProvider.so",
@@ -68,8 +63,9 @@ TEST(InstalledTest, ProviderCanBeHadAlone)
 
 TEST(InstalledTest, ToolShowsTheDemonstration)
 {
-    const Ended ended = run({"list", "--model", fileOf("share/sensor-profile/demo-model.json")},
-        installedTool({{"COLUMNS", "80"}}));
+    const Ended ended =
+        run({"list", "--model", installedFile("share/sensor-profile/demo-model.json")},
+            installedTool({{"COLUMNS", "80"}}));
     EXPECT_EQ(ended.err, "");
     EXPECT_EQ(ended.code, 0);
     EXPECT_EQ(
@@ -81,8 +77,8 @@ TEST(InstalledTest, ToolFindsTheCatalogs)
     for (const auto& [language, text] :
         std::map<std::string, std::string>{{"de_DE.UTF-8", "Numerischer Sensor"},
             {"fr_FR.UTF-8", "Capteur"}, {"es_ES.UTF-8", "Sensor num"}, {"C", "Numeric sensor"}}) {
-        const Ended ended = run(
-            {"get", "12 V", "--json", "--model", fileOf("share/sensor-profile/demo-model.json")},
+        const Ended ended = run({"get", "12 V", "--json", "--model",
+                                    installedFile("share/sensor-profile/demo-model.json")},
             installedTool({{"LC_ALL", language}}));
         ASSERT_EQ(ended.code, 0) << ended.err;
         EXPECT_THAT(
@@ -92,8 +88,9 @@ TEST(InstalledTest, ToolFindsTheCatalogs)
 
 TEST(InstalledTest, ToolFollowsTheAssociationsThroughBothLibraries)
 {
-    const Ended ended = run({"walk", "--model", fileOf("share/sensor-profile/demo-model.json")},
-        installedTool({{"LC_ALL", "C.UTF-8"}}));
+    const Ended ended =
+        run({"walk", "--model", installedFile("share/sensor-profile/demo-model.json")},
+            installedTool({{"LC_ALL", "C.UTF-8"}}));
     EXPECT_EQ(ended.code, 0) << ended.err;
     EXPECT_THAT(ended.out, HasSubstr("(ZUMLO_ComputerSystem)"));
     EXPECT_THAT(ended.out, HasSubstr("PSU 2 Fan"));

@@ -25,4 +25,10 @@ std::vector<std::string> filesBelow(const std::filesystem::path& folder);
 // for the process, since it only reads the build.
 const std::filesystem::path& movedInstallation();
 
+// Returns the path of one of its files.
+inline std::string installedFile(const std::string& name)
+{
+    return (movedInstallation() / name).string();
+}
+
 } // namespace Testing

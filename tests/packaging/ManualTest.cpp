@@ -107,8 +107,7 @@ TEST(SettingsOfTheServiceTest, AreOptionsOfTheServer)
 
 TEST(ManualOfRegisteringTest, HasTheOptionsOfTheCommand)
 {
-    const Ended help = run(
-        {"--help"}, {.program = (movedInstallation() / "sbin/sensor-profile-register").string()});
+    const Ended help = run({"--help"}, {.program = installedFile("sbin/sensor-profile-register")});
     EXPECT_EQ(longOptions(rendered("sensor-profile-register.8")), longOptions(help.out));
 }
 

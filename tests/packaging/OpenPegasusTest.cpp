@@ -144,11 +144,8 @@ TEST_F(OpenPegasusTest, RegistersInAnotherNamespace)
         HasSubstr("Registered in root/sensors_2."));
     EXPECT_THAT(calls().at(1),
         "cimmof -uc -n root/sensors_2 " + shared("sensor-profile-computer-system.mof"));
-    std::string document = contentOf(registration_);
-    for (auto at = document.find("root/cimv2"); at != std::string::npos;
-         at = document.find("root/cimv2"))
-        document.replace(at, 10, "root/sensors_2");
-    EXPECT_EQ(contentOf(path("sensor-profile-registration.mof")), document);
+    EXPECT_EQ(contentOf(path("sensor-profile-registration.mof")),
+        replaced(contentOf(registration_), "root/cimv2", "root/sensors_2"));
 }
 
 TEST_F(OpenPegasusTest, DryRunPrintsTheStepsAndTakesNone)

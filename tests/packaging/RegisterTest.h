@@ -125,17 +125,16 @@ protected:
     // The folder of the libraries, or one of them.
     static std::string library(const std::string& name = "")
     {
-        const auto folder = movedInstallation() / "lib/cmpi";
-        return (name.empty() ? folder : folder / name).string();
+        return installedFile("lib/cmpi" + (name.empty() ? "" : "/" + name));
     }
 
     static std::string shared(const std::string& name)
     {
-        return (movedInstallation() / "share/sensor-profile" / name).string();
+        return installedFile("share/sensor-profile/" + name);
     }
 
     TemporaryFolder folder_;
-    const std::string program_ = (movedInstallation() / "sbin/sensor-profile-register").string();
+    const std::string program_ = installedFile("sbin/sensor-profile-register");
     static constexpr const char* sensorLibrary_ = "libSensorProfileProvider.so";
     static constexpr const char* systemLibrary_ = "libComputerSystemProvider.so";
 

@@ -154,11 +154,8 @@ TEST_F(SfcbTest, RegisteringInAnotherNamespaceMovesTheClasses)
     EXPECT_THAT(stage(), ElementsAre("mofs/root/cimv2/other.mof",
                              "mofs/root/sensors/sensor-profile-computer-system.mof",
                              "mofs/root/sensors/sensor-profile.mof", "regs/sensor-profile.reg"));
-    std::string expected = contentOf(shared("registration/sensor-profile.reg"));
-    for (auto at = expected.find("root/cimv2"); at != std::string::npos;
-         at = expected.find("root/cimv2"))
-        expected.replace(at, 10, "root/sensors");
-    EXPECT_EQ(stagedRegistration(), expected);
+    EXPECT_EQ(stagedRegistration(), replaced(contentOf(shared("registration/sensor-profile.reg")),
+                                        "root/cimv2", "root/sensors"));
 }
 
 TEST_F(SfcbTest, RemovingFromANamespaceLeavesTheRegistrationOfAnother)

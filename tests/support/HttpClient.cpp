@@ -89,7 +89,7 @@ void HttpClient::send(std::string_view bytes)
 bool HttpClient::trySend(std::string_view bytes)
 {
     while (!bytes.empty()) {
-        if (!waitFor(POLLOUT, patience))
+        if (!waitFor(POLLOUT, timeout))
             throw std::runtime_error("the server does not read");
         const ::ssize_t sent = write(bytes.data(), bytes.size());
         if (sent < 0 && (errno == EAGAIN || errno == EINTR))
@@ -203,7 +203,7 @@ std::string HttpClient::chunks()
 
 bool HttpClient::readMore()
 {
-    if (!waitFor(POLLIN, patience))
+    if (!waitFor(POLLIN, timeout))
         throw std::runtime_error("nothing came");
     std::array<char, 65536> piece{};
     const ::ssize_t got = read(piece.data(), piece.size());

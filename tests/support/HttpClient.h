@@ -28,10 +28,10 @@ struct HttpReply {
     }
 };
 
-// Every failure and everything that takes longer than the patience throws std::runtime_error.
+// Every failure and everything that exceeds the timeout throws std::runtime_error.
 class HttpClient {
 public:
-    static constexpr std::chrono::seconds patience{20};
+    static constexpr std::chrono::seconds timeout{20};
 
     explicit HttpClient(std::uint16_t port, const std::string& host = "127.0.0.1");
     virtual ~HttpClient();

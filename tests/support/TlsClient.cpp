@@ -41,7 +41,7 @@ TlsClient::TlsClient(std::uint16_t port, const std::string& priorities) : HttpCl
     require(::gnutls_credentials_set(session, GNUTLS_CRD_CERTIFICATE, credentials));
     ::gnutls_transport_set_int(session, descriptor());
     ::gnutls_handshake_set_timeout(
-        session, static_cast<unsigned>(std::chrono::milliseconds(patience).count()));
+        session, static_cast<unsigned>(std::chrono::milliseconds(timeout).count()));
     int result = 0;
     do
         result = ::gnutls_handshake(session);

@@ -2,6 +2,7 @@
 
 #include "tools/output/FileReplacement.h"
 
+#include "tests/support/ErrorOf.h"
 #include "tests/support/TemporaryFolder.h"
 #include "tests/tools/ToolTest.h"
 
@@ -12,7 +13,6 @@
 #include <sys/stat.h>
 
 #include <csignal>
-#include <stdexcept>
 
 namespace {
 
@@ -31,12 +31,7 @@ protected:
 
     std::string failureOf(const std::string& file, const std::string& content) const
     {
-        try {
-            replaceFile(file, content);
-        } catch (const std::runtime_error& error) {
-            return error.what();
-        }
-        return "no failure";
+        return Testing::errorOf([&] { replaceFile(file, content); });
     }
 
     Testing::TemporaryFolder folder_;

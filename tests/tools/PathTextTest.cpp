@@ -5,11 +5,14 @@
 #include "host/broker/Broker.h"
 #include "host/broker/ObjectPath.h"
 #include "host/broker/Request.h"
+#include "tests/support/ErrorOf.h"
 #include "tests/support/ShippedClasses.h"
 #include "tools/UsageError.h"
 
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
+
+#include <algorithm>
 
 namespace {
 
@@ -29,13 +32,9 @@ protected:
 
     std::string mistakeIn(std::string_view text)
     {
-        try {
-            return again(text);
-        } catch (const Tools::UsageError& error) {
-            const std::string what = error.what();
-            EXPECT_EQ(what.substr(0, text.size() + 2), std::string(text) + ": ");
-            return what.substr(text.size() + 2);
-        }
+        const std::string what = Testing::errorOf([&] { again(text); });
+        EXPECT_EQ(what.substr(0, text.size() + 2), std::string(text) + ": ");
+        return what.substr(std::min(text.size() + 2, what.size()));
     }
 
     const std::unique_ptr<const Host::Repository> classes_ = Testing::shippedClasses();

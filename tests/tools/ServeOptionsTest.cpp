@@ -3,6 +3,7 @@
 // Every limit of the server as an option and as a setting: its name, its default and its bounds.
 
 #include "tools/serve/ServeOptions.h"
+#include "tests/support/ErrorOf.h"
 #include "tests/support/TemporaryFolder.h"
 
 #include <CLI/CLI.hpp>
@@ -90,26 +91,6 @@ protected:
         return typed({"--config", folder_.write("settings", line + "\n")});
     }
 
-    // Why the value is none; empty when it is taken.
-    static std::string refusal(const Limit& limit, std::uint64_t value)
-    {
-        try {
-            typed({"--" + limit.name, std::to_string(value)});
-        } catch (const CLI::ParseError& error) {
-            return error.what();
-        }
-        return {};
-    }
-    std::string configuredRefusal(const Limit& limit, std::uint64_t value) const
-    {
-        try {
-            configured(limit.name + " = " + std::to_string(value));
-        } catch (const std::runtime_error& error) {
-            return error.what();
-        }
-        return {};
-    }
-
     Testing::TemporaryFolder folder_;
 };
 
@@ -139,11 +120,12 @@ TEST_F(ServeOptionsTest, ValuesBeyondTheBoundsAreRefusedNamingThem)
 {
     for (const Limit& limit : limits)
         for (const std::uint64_t value : {limit.least - 1, limit.most + 1}) {
-            const std::string reason = "--" + limit.name + ": Value " + std::to_string(value) +
-                                       " not in range " + std::to_string(limit.least) + " to " +
+            const std::string number = std::to_string(value);
+            const std::string reason = "--" + limit.name + ": Value " + number + " not in range " +
+                                       std::to_string(limit.least) + " to " +
                                        std::to_string(limit.most);
-            EXPECT_EQ(refusal(limit, value), reason);
-            EXPECT_EQ(configuredRefusal(limit, value),
+            EXPECT_EQ(Testing::errorOf([&] { typed({"--" + limit.name, number}); }), reason);
+            EXPECT_EQ(Testing::errorOf([&] { configured(limit.name + " = " + number); }),
                 (folder_.path() / "settings").string() + ":1: " + reason);
         }
 }

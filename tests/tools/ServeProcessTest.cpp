@@ -37,8 +37,8 @@ public:
         sockaddr_un address{};
         address.sun_family = AF_UNIX;
         path_.copy(address.sun_path, sizeof address.sun_path - 1);
-        const timeval patience{10, 0};
-        if (::setsockopt(socket_, SOL_SOCKET, SO_RCVTIMEO, &patience, sizeof patience) != 0 ||
+        const timeval timeout{10, 0};
+        if (::setsockopt(socket_, SOL_SOCKET, SO_RCVTIMEO, &timeout, sizeof timeout) != 0 ||
             ::bind(socket_, reinterpret_cast<const sockaddr*>(&address), sizeof address) != 0)
             throw std::system_error(errno, std::generic_category());
     }

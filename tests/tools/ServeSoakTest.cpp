@@ -9,6 +9,7 @@
 #include "tests/support/HttpClient.h"
 #include "tests/support/MountNamespace.h"
 #include "tests/support/TlsClient.h"
+#include "tests/support/WaitUntil.h"
 #include "tests/tools/ServerProcess.h"
 #include "tests/tools/ToolTest.h"
 
@@ -72,21 +73,13 @@ bool isWellFormed(const std::string& text)
            XML_STATUS_OK;
 }
 
-int countOf(const std::string& text, std::string_view part)
-{
-    int count = 0;
-    for (auto at = text.find(part); at != std::string::npos; at = text.find(part, at + 1))
-        ++count;
-    return count;
-}
-
 // Returns how many sensors the response holds; -1 when it is not whole or holds an error.
 int sensorsOf(const HttpReply& reply)
 {
     if (reply.status != 200 || !reply.body.ends_with("</CIM>\n") || !isWellFormed(reply.body) ||
         countOf(reply.body, "<ERROR ") != 0 || countOf(reply.body, "<IRETURNVALUE>") != 1)
         return -1;
-    return countOf(reply.body, "<INSTANCE CLASSNAME=\"ZUMLO_NumericSensor\">");
+    return static_cast<int>(countOf(reply.body, "<INSTANCE CLASSNAME=\"ZUMLO_NumericSensor\">"));
 }
 
 // What the answers had.
@@ -189,12 +182,7 @@ protected:
     // The server sees the end of connections a little after the clients.
     bool waitForDescriptors(std::size_t count) const
     {
-        for (const auto end = Clock::now() + 10s; descriptors() != count;) {
-            if (Clock::now() > end)
-                return false;
-            std::this_thread::sleep_for(10ms);
-        }
-        return true;
+        return waitUntil([&] { return descriptors() == count; }, 10s);
     }
 
     TemporaryFolder folder_;

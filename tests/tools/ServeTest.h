@@ -32,11 +32,7 @@ inline std::string request(
 
 inline std::size_t sensorsIn(const std::string& answer)
 {
-    std::size_t count = 0;
-    for (auto at = answer.find("<INSTANCENAME "); at != std::string::npos;
-         at = answer.find("<INSTANCENAME ", at + 1))
-        ++count;
-    return count;
+    return countOf(answer, "<INSTANCENAME ");
 }
 
 inline HttpReply ask(HttpClient client, const std::string& text = request())

@@ -2,7 +2,8 @@
 
 #include "tests/tools/ServerProcess.h"
 
-#include "tests/tools/ToolTest.h"
+#include "tests/support/Texts.h"
+#include "tests/support/WaitUntil.h"
 
 #include <fcntl.h>
 #include <spawn.h>
@@ -10,29 +11,13 @@
 #include <unistd.h>
 
 #include <algorithm>
-#include <chrono>
 #include <csignal>
-#include <functional>
 #include <stdexcept>
 #include <system_error>
-#include <thread>
 
 namespace Testing {
 
 namespace {
-
-constexpr std::chrono::seconds patience{30};
-
-bool waitUntil(const std::function<bool()>& isSo)
-{
-    const auto end = std::chrono::steady_clock::now() + patience;
-    while (!isSo()) {
-        if (std::chrono::steady_clock::now() > end)
-            return false;
-        std::this_thread::sleep_for(std::chrono::milliseconds(5));
-    }
-    return true;
-}
 
 bool names(const std::vector<std::string>& arguments, const std::string& option)
 {

@@ -5,6 +5,7 @@
 #pragma once
 
 #include "tests/support/TemporaryFolder.h"
+#include "tests/support/Texts.h"
 #include "tests/tools/ChildProcess.h"
 
 #include <gtest/gtest.h>
@@ -12,27 +13,10 @@
 
 #include <filesystem>
 #include <fstream>
-#include <iterator>
-#include <sstream>
 #include <string>
 #include <vector>
 
 namespace Testing {
-
-inline std::string contentOf(const std::filesystem::path& file)
-{
-    std::ifstream in(file, std::ios::binary);
-    return {std::istreambuf_iterator<char>(in), std::istreambuf_iterator<char>()};
-}
-
-inline std::vector<std::string> linesOf(const std::string& text)
-{
-    std::istringstream in(text);
-    std::vector<std::string> lines;
-    for (std::string line; std::getline(in, line);)
-        lines.push_back(line);
-    return lines;
-}
 
 class ToolTest : public ::testing::Test {
 protected:

@@ -12,6 +12,7 @@
 #include "host/http/Server.h"
 #include "tests/support/CimCall.h"
 #include "tests/support/HttpClient.h"
+#include "tests/support/WaitUntil.h"
 
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
@@ -143,10 +144,7 @@ protected:
     // Soon.
     void expectNoAnswerAlive() const
     {
-        const auto end = std::chrono::steady_clock::now() + HttpClient::patience;
-        while (operations.answersAlive != 0 && std::chrono::steady_clock::now() < end)
-            std::this_thread::sleep_for(std::chrono::milliseconds(50));
-        EXPECT_EQ(operations.answersAlive, 0);
+        EXPECT_TRUE(Testing::waitUntil([this] { return operations.answersAlive == 0; }));
     }
 
     StubOperations operations;

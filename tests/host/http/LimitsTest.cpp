@@ -177,7 +177,7 @@ TEST_F(LimitsTest, AnswersThatNobodyFetchesLeaveRoomForNoMoreOfTheirKind)
     for (int i = 0; i < 2; ++i) {
         readers.push_back(connect());
         readers.back().send(post());
-        ASSERT_TRUE(readers.back().hasReplyWithin(HttpClient::patience));
+        ASSERT_TRUE(readers.back().hasReplyWithin(HttpClient::timeout));
     }
     HttpClient refused = connect();
     refused.send(post());
@@ -193,10 +193,8 @@ TEST_F(LimitsTest, AnswersThatNobodyFetchesLeaveRoomForNoMoreOfTheirKind)
 
     operations.answerWith(piece, 5000);
     readers.clear();
-    const auto end = std::chrono::steady_clock::now() + HttpClient::patience;
-    int status = 503;
-    while (status == 503 && std::chrono::steady_clock::now() < end)
-        status = ask(post()).status;
+    int status = 0;
+    EXPECT_TRUE(Testing::waitUntil([&] { return (status = ask(post()).status) != 503; }));
     EXPECT_EQ(status, 200);
     EXPECT_EQ(operations.answersAlive, 0);
 }
@@ -225,18 +223,17 @@ TEST_F(LimitsTest, RequestsBeyondTheQueueAreToldToComeAgain)
         others.push_back(connect());
         others.back().send(post());
     }
-    const auto end = std::chrono::steady_clock::now() + HttpClient::patience;
-    while (others.size() > 1 && std::chrono::steady_clock::now() < end)
-        for (auto other = others.begin(); other != others.end();) {
-            if (!other->hasReplyWithin(10ms)) {
-                ++other;
-                continue;
-            }
-            const HttpReply reply = other->receive();
+    Testing::waitUntil([&] {
+        std::erase_if(others, [](HttpClient& other) {
+            if (!other.hasReplyWithin(10ms))
+                return false;
+            const HttpReply reply = other.receive();
             EXPECT_EQ(reply.status, 503);
             EXPECT_EQ(reply.field("retry-after"), "1");
-            other = others.erase(other);
-        }
+            return true;
+        });
+        return others.size() <= 1;
+    });
     ASSERT_EQ(others.size(), 1U);
     EXPECT_FALSE(others.front().hasReplyWithin(100ms)); // it waits
     gate.open();
@@ -265,15 +262,17 @@ TEST_F(LimitsTest, SilentConnectionsEnd)
 }
 
 // Sends a byte now and then on each until it ends; false when that takes longer.
-bool endWhileTrickling(std::vector<HttpClient> clients, std::chrono::seconds patience)
+bool endWhileTrickling(std::vector<HttpClient> clients, std::chrono::seconds timeout)
 {
-    const auto end = std::chrono::steady_clock::now() + patience;
-    while (!clients.empty() && std::chrono::steady_clock::now() < end)
-        for (auto client = clients.begin(); client != clients.end();) {
-            const bool hasEnded = !client->trySend("x") || client->hasReplyWithin(50ms);
-            client = hasEnded ? clients.erase(client) : client + 1;
-        }
-    return clients.empty();
+    const auto hasEnded = [](HttpClient& client) {
+        return !client.trySend("x") || client.hasReplyWithin(50ms);
+    };
+    return Testing::waitUntil(
+        [&] {
+            std::erase_if(clients, hasEnded);
+            return clients.empty();
+        },
+        timeout);
 }
 
 TEST_F(LimitsTest, SlowSendersEnd)

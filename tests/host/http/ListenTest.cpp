@@ -3,6 +3,7 @@
 // Where the server may listen, and what comes in its way.
 
 #include "tests/host/http/HttpTest.h"
+#include "tests/support/ErrorOf.h"
 #include "tests/support/LogCapture.h"
 
 namespace HttpTests {
@@ -27,12 +28,7 @@ std::vector<std::string> placesFor(const ListenWishes& wishes)
 
 std::string refusalOf(const ListenWishes& wishes)
 {
-    try {
-        endpointsFor(wishes);
-        return "";
-    } catch (const std::invalid_argument& error) {
-        return error.what();
-    }
+    return Testing::errorOf([&] { endpointsFor(wishes); });
 }
 
 TEST(ListenPolicyTest, LoopbackIsTheDefault)

@@ -4,6 +4,7 @@
 
 #include "host/http/Passwords.h"
 #include "tests/host/http/Hashes.h"
+#include "tests/support/ErrorOf.h"
 #include "tests/support/Requirement.h"
 #include "tests/support/TemporaryFolder.h"
 
@@ -24,12 +25,7 @@ using testing::HasSubstr;
 
 std::string problemOf(const std::string& text)
 {
-    try {
-        const Passwords passwords(text, "file");
-        return "";
-    } catch (const std::runtime_error& error) {
-        return error.what();
-    }
+    return Testing::errorOf([&] { const Passwords passwords(text, "file"); });
 }
 
 TEST(PasswordsTest, KnowThreeSchemes)
@@ -103,12 +99,7 @@ protected:
     }
     std::string problemWith(const std::string& file) const
     {
-        try {
-            Passwords::read(file);
-            return "";
-        } catch (const std::runtime_error& error) {
-            return error.what();
-        }
+        return Testing::errorOf([&] { Passwords::read(file); });
     }
 
     Testing::TemporaryFolder folder_;

@@ -8,30 +8,13 @@
 // alone. Within a line, \r, \n, \0 and \xNN stand for a byte.
 
 #include "tests/host/http/HttpTest.h"
+#include "tests/support/Texts.h"
 
 namespace HttpTests {
 
 namespace {
 
 const std::filesystem::path Folder = SENSOR_PROFILE_SOURCE_DIR "/tests/data/http";
-
-std::string contentOf(const std::filesystem::path& file)
-{
-    std::ifstream in(file, std::ios::binary);
-    EXPECT_TRUE(in.is_open()) << file;
-    std::ostringstream content;
-    content << in.rdbuf();
-    return content.str();
-}
-
-std::vector<std::string> exchangeNames()
-{
-    std::vector<std::string> names;
-    for (const auto& entry : std::filesystem::directory_iterator(Folder))
-        names.push_back(entry.path().stem().string());
-    std::sort(names.begin(), names.end());
-    return names;
-}
 
 // Returns the byte that the escape at the beginning stands for, and removes the escape.
 char takeEscape(std::string_view& text)
@@ -118,7 +101,7 @@ protected:
 
 TEST_P(RequestFilesTest, OutcomeIsTheExpectedOne)
 {
-    const std::string content = contentOf(Folder / (GetParam() + ".exchange"));
+    const std::string content = Testing::contentOf(Folder / (GetParam() + ".exchange"));
     const std::string separator = "-- Answer:\n";
     const std::size_t requestEnd = content.find(separator);
     ASSERT_NE(requestEnd, content.npos);
@@ -129,11 +112,8 @@ TEST_P(RequestFilesTest, OutcomeIsTheExpectedOne)
 }
 
 INSTANTIATE_TEST_SUITE_P(
-    Files, RequestFilesTest, testing::ValuesIn(exchangeNames()), [](const auto& file) {
-        std::string name = file.param;
-        std::replace_if(
-            name.begin(), name.end(), [](char c) { return c == '-' || c == '.'; }, '_');
-        return name;
+    Files, RequestFilesTest, testing::ValuesIn(Testing::fileStemsIn(Folder)), [](const auto& file) {
+        return Testing::replaced(Testing::replaced(file.param, "-", "_"), ".", "_");
     });
 
 } // namespace

@@ -17,8 +17,7 @@ protected:
     // Waits until an operation runs.
     void waitForWork()
     {
-        for (int i = 0; i < 500 && operations.calls == 0; ++i)
-            std::this_thread::sleep_for(10ms);
+        EXPECT_TRUE(Testing::waitUntil([this] { return operations.calls != 0; }));
     }
 };
 

@@ -1,6 +1,7 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
 #include "tests/host/http/HttpTest.h"
+#include "tests/support/ErrorOf.h"
 #include "tests/support/LogCapture.h"
 #include "tests/support/TemporaryFolder.h"
 #include "tests/support/TlsClient.h"
@@ -31,13 +32,9 @@ protected:
 
     std::string problemWith(const std::string& certificateFile, const std::string& keyFile) const
     {
-        try {
-            Certificate::read(file(certificateFile), file(keyFile));
-            return "";
-        } catch (const std::runtime_error& error) {
-            const std::string text = error.what();
-            return text.substr(folder_.path().string().size() + 1);
-        }
+        const std::string error =
+            Testing::errorOf([&] { Certificate::read(file(certificateFile), file(keyFile)); });
+        return error.empty() ? "" : error.substr(folder_.path().string().size() + 1);
     }
 
     Testing::TemporaryFolder folder_;

@@ -7,6 +7,7 @@
 #include "host/manager/Manager.h"
 #include "tests/host/manager/OddProvider.h"
 #include "tests/support/ClassTable.h"
+#include "tests/support/ErrorOf.h"
 #include "tests/support/TemporaryFolder.h"
 
 #include <gmock/gmock.h>
@@ -14,7 +15,6 @@
 
 #include <dlfcn.h>
 
-#include <functional>
 #include <memory>
 #include <optional>
 #include <stdexcept>
@@ -55,16 +55,6 @@ private:
     void* library_;
     Testing::OddProviderReportFunction report_ = nullptr;
 };
-
-std::string failureOf(const std::function<void()>& action)
-{
-    try {
-        action();
-    } catch (const std::runtime_error& error) {
-        return error.what();
-    }
-    return "no failure";
-}
 
 class ProviderLibraryTest : public testing::Test {
 protected:
@@ -135,28 +125,28 @@ TEST_F(ProviderLibraryTest, NamesAFileThatIsMissingOrNoLibrary)
 {
     const Testing::TemporaryFolder folder;
     const std::string text = folder.write("text.so", "no library");
-    EXPECT_THAT(failureOf([&] { Host::ProviderLibrary(broker_, "/no/such.so"); }),
+    EXPECT_THAT(Testing::errorOf([&] { Host::ProviderLibrary(broker_, "/no/such.so"); }),
         AllOf(HasSubstr("/no/such.so"), HasSubstr("No such file")));
-    EXPECT_THAT(failureOf([&] { Host::ProviderLibrary(broker_, text); }), HasSubstr(text));
+    EXPECT_THAT(Testing::errorOf([&] { Host::ProviderLibrary(broker_, text); }), HasSubstr(text));
 }
 
 TEST_F(ProviderLibraryTest, NamesTheFactoryThatIsMissing)
 {
     Host::ProviderLibrary library(broker_, oddProvider);
-    EXPECT_EQ(failureOf([&] { library.createInstanceMI("Absent"); }),
+    EXPECT_EQ(Testing::errorOf([&] { library.createInstanceMI("Absent"); }),
         oddProvider + ": no factory Absent_Create_InstanceMI");
-    EXPECT_EQ(failureOf([&] { library.createAssociationMI("Staying"); }),
+    EXPECT_EQ(Testing::errorOf([&] { library.createAssociationMI("Staying"); }),
         oddProvider + ": no factory Staying_Create_AssociationMI");
 }
 
 TEST_F(ProviderLibraryTest, SaysWhyAFactoryRefuses)
 {
     Host::ProviderLibrary library(broker_, oddProvider);
-    EXPECT_EQ(failureOf([&] { library.createInstanceMI("Refusing"); }),
+    EXPECT_EQ(Testing::errorOf([&] { library.createInstanceMI("Refusing"); }),
         oddProvider + ": Refusing_Create_InstanceMI answers code 2: not on this machine");
-    EXPECT_EQ(failureOf([&] { library.createInstanceMI("Empty"); }),
+    EXPECT_EQ(Testing::errorOf([&] { library.createInstanceMI("Empty"); }),
         oddProvider + ": Empty_Create_InstanceMI answers with nothing");
-    EXPECT_EQ(failureOf([&] { library.createInstanceMI("Ancient"); }),
+    EXPECT_EQ(Testing::errorOf([&] { library.createInstanceMI("Ancient"); }),
         oddProvider + ": Ancient_Create_InstanceMI answers with a function table of version 86");
 }
 
@@ -167,7 +157,7 @@ protected:
     static std::string failureOfLoading(std::vector<Host::ProviderRegistration> registrations)
     {
         const Testing::ClassTable classes;
-        return failureOf([&] { Host::Manager(classes, std::move(registrations)); });
+        return Testing::errorOf([&] { Host::Manager(classes, std::move(registrations)); });
     }
 };
 

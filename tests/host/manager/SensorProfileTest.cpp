@@ -10,6 +10,7 @@
 #include "host/broker/Request.h"
 #include "host/manager/Manager.h"
 #include "tests/support/Environment.h"
+#include "tests/support/ErrorOf.h"
 #include "tests/support/ShippedClasses.h"
 #include "tests/support/TemporaryFolder.h"
 
@@ -101,13 +102,11 @@ TEST_F(SensorProfileTest, WithoutTheCompanionSensorsAreStillServed)
 
 TEST_F(SensorProfileTest, AMissingLibraryIsAFailureThatNamesIt)
 {
-    try {
+    EXPECT_THAT(Testing::errorOf([&] {
         const Host::Manager manager(
             *classes_, Host::sensorProfileProviders(sensorLibrary, "/no/such/library.so"));
-        FAIL() << "no failure";
-    } catch (const std::runtime_error& failure) {
-        EXPECT_THAT(failure.what(), HasSubstr("/no/such/library.so"));
-    }
+    }),
+        HasSubstr("/no/such/library.so"));
 }
 
 TEST_F(SensorProfileTest, EightThreadsWalkAtOnce)

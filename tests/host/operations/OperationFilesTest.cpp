@@ -13,7 +13,6 @@
 
 #include <algorithm>
 #include <filesystem>
-#include <fstream>
 #include <map>
 #include <sstream>
 #include <vector>
@@ -23,22 +22,6 @@ namespace OperationTests {
 namespace {
 
 const std::filesystem::path Folder = SENSOR_PROFILE_SOURCE_DIR "/tests/data/cimxml/operations";
-
-std::string contentOf(const std::filesystem::path& file)
-{
-    std::ifstream in(file);
-    EXPECT_TRUE(in.is_open()) << file;
-    std::ostringstream content;
-    content << in.rdbuf();
-    return content.str();
-}
-
-std::string replaced(std::string text, std::string_view from, const std::string& to)
-{
-    for (auto at = text.find(from); at != std::string::npos; at = text.find(from, at + to.size()))
-        text.replace(at, from.size(), to);
-    return text;
-}
 
 // Without line breaks and the indentation after them.
 std::string unfolded(const std::string& text)
@@ -58,27 +41,19 @@ struct Exchange {
 Exchange exchangeIn(const std::filesystem::path& file)
 {
     constexpr std::string_view separator = "<!-- response -->\n";
-    const std::string content = contentOf(file);
+    const std::string content = Testing::contentOf(file);
     const auto end = content.find(separator);
     if (end == std::string::npos)
         throw std::invalid_argument(file.string() + " has no response");
     return {content.substr(0, end), content.substr(end + separator.size())};
 }
 
-std::vector<std::string> exchangeNames()
-{
-    std::vector<std::string> names;
-    for (const auto& entry : std::filesystem::directory_iterator(Folder))
-        names.push_back(entry.path().stem().string());
-    std::sort(names.begin(), names.end());
-    return names;
-}
-
 class OperationFilesTest : public testing::TestWithParam<std::string> {
 protected:
     std::string filledIn(const std::string& text) const
     {
-        return replaced(replaced(text, "@SYSTEM@", Vorn::getSystemName()), "@CONTEXT@", context_);
+        return Testing::replaced(
+            Testing::replaced(text, "@SYSTEM@", Vorn::getSystemName()), "@CONTEXT@", context_);
     }
 
     std::string responseTo(const std::string& request)
@@ -103,14 +78,14 @@ TEST_P(OperationFilesTest, ResponseIsTheExpectedOne)
     EXPECT_EQ(unfolded(response), unfolded(filledIn(exchange.response)));
 }
 
-INSTANTIATE_TEST_SUITE_P(Files, OperationFilesTest, testing::ValuesIn(exchangeNames()),
-    [](const auto& file) { return replaced(file.param, "-", "_"); });
+INSTANTIATE_TEST_SUITE_P(Files, OperationFilesTest, testing::ValuesIn(Testing::fileStemsIn(Folder)),
+    [](const auto& file) { return Testing::replaced(file.param, "-", "_"); });
 
 TEST(OperationFilesCoverageTest, HasEveryOperationWithEachOfItsParameters)
 {
     using Host::CimXml::Parameter;
     std::map<std::string, std::string> textsByOperation;
-    for (const std::string& name : exchangeNames()) {
+    for (const std::string& name : Testing::fileStemsIn(Folder)) {
         const std::string text = exchangeIn(Folder / (name + ".xml")).request;
         textsByOperation[between(text, "<IMETHODCALL NAME=\"", "\"")] += text;
     }

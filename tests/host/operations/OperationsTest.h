@@ -7,6 +7,7 @@
 #include "host/cimxml/Message.h"
 #include "host/cimxml/OperationHandler.h"
 #include "tests/host/cimxml/CimXmlTest.h"
+#include "tests/support/Texts.h"
 
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
@@ -23,6 +24,7 @@ using Host::CimXml::Caller;
 using Host::CimXml::Message;
 using Host::CimXml::OperationHandler;
 using Host::CimXml::Response;
+using Testing::countOf;
 
 inline std::string callIn(
     const std::string& nameSpace, const std::string& operation, const std::string& parameters = {})
@@ -79,14 +81,6 @@ inline bool isEndOfSequence(const std::string& answer)
 {
     return between(answer, "<PARAMVALUE NAME=\"EndOfSequence\" PARAMTYPE=\"boolean\"><VALUE>",
                "</VALUE>") == "TRUE";
-}
-
-inline std::size_t countOf(const std::string& text, std::string_view part)
-{
-    std::size_t count = 0;
-    for (std::size_t at = text.find(part); at != std::string::npos; at = text.find(part, at + 1))
-        ++count;
-    return count;
 }
 
 } // namespace OperationTests

@@ -5,6 +5,7 @@
 #pragma once
 
 #include "host/repository/Compiler.h"
+#include "tests/support/ErrorOf.h"
 
 #include <gtest/gtest.h>
 
@@ -43,15 +44,10 @@ inline std::unique_ptr<const Host::Repository> compile(std::string_view text)
     return std::move(compiler).finish();
 }
 
-// What is wrong with the text, with its place; "no error" when nothing is.
+// Returns what is wrong with the text, and where; an empty text when nothing is.
 inline std::string errorOf(std::string_view text)
 {
-    try {
-        compile(text);
-        return "no error";
-    } catch (const std::runtime_error& error) {
-        return error.what();
-    }
+    return errorOf([&] { compile(text); });
 }
 
 inline const Host::ClassDeclaration& classNamed(

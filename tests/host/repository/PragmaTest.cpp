@@ -22,12 +22,7 @@ protected:
 
     std::string errorOf(const std::string& file)
     {
-        try {
-            compileFile(file);
-            return "no error";
-        } catch (const std::runtime_error& error) {
-            return error.what();
-        }
+        return Testing::errorOf([&] { compileFile(file); });
     }
 
     Testing::TemporaryFolder folder_;

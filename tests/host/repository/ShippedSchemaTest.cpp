@@ -4,6 +4,7 @@
 
 #include "host/repository/Compiler.h"
 #include "tests/support/TemporaryFolder.h"
+#include "tests/support/Texts.h"
 
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
@@ -126,12 +127,10 @@ TEST_F(ShippedSchemaTest, TheFilesCompileOneByOneToo)
 TEST_F(ShippedSchemaTest, TheAncestorsCompileAsOneFile)
 {
     std::string all;
-    for (const char* const name : {"qualifiers.mof", "cim-core.mof", "cim-ancestors.mof"}) {
-        std::ifstream file(Folder / name);
-        for (std::string line; std::getline(file, line);)
+    for (const char* const name : {"qualifiers.mof", "cim-core.mof", "cim-ancestors.mof"})
+        for (const std::string& line : Testing::linesOf(Testing::contentOf(Folder / name)))
             if (!line.starts_with("#pragma include"))
                 all += line + '\n';
-    }
     const Testing::TemporaryFolder files;
     Host::Compiler compiler;
     compiler.compileFile(files.write("10-cim.mof", all), Cimv2);

@@ -6,6 +6,7 @@
 
 #include "platform/instrumentation/Instrumentation.h"
 #include "platform/instrumentation/Source.h"
+#include "tests/support/ErrorOf.h"
 
 #include <optional>
 #include <stdexcept>
@@ -70,18 +71,6 @@ inline const SeenNode& nodeAt(const std::vector<SeenNode>& nodes, const std::str
         if (node.path == path)
             return node;
     throw std::out_of_range("no node " + path);
-}
-
-// The text of the error that an action throws; empty when it throws none.
-template <typename Action>
-std::string errorOf(const Action& action)
-{
-    try {
-        action();
-    } catch (const std::runtime_error& error) {
-        return error.what();
-    }
-    return {};
 }
 
 } // namespace Testing

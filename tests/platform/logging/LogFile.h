@@ -7,8 +7,8 @@
 #include "platform/logging/LogSettings.h"
 #include "platform/logging/RynLogger.h"
 #include "tests/support/TemporaryFolder.h"
+#include "tests/support/Texts.h"
 
-#include <fstream>
 #include <string>
 #include <vector>
 
@@ -19,14 +19,7 @@ public:
     std::string path() const { return (folder_.path() / "lines").string(); }
     std::string sink() const { return "file:" + path(); }
 
-    std::vector<std::string> lines() const
-    {
-        std::vector<std::string> found;
-        std::ifstream in(path(), std::ios::binary);
-        for (std::string line; std::getline(in, line);)
-            found.push_back(line);
-        return found;
-    }
+    std::vector<std::string> lines() const { return linesOf(contentOf(path())); }
 
 private:
     TemporaryFolder folder_;
