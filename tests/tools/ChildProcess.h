@@ -12,6 +12,10 @@
 namespace Testing {
 
 inline const std::string sensorctl = SENSOR_PROFILE_BINARY_DIR "/bin/sensorctl";
+inline const std::string sensorLibrary =
+    SENSOR_PROFILE_BINARY_DIR "/lib/libSensorProfileProvider.so";
+inline const std::string systemLibrary =
+    SENSOR_PROFILE_BINARY_DIR "/lib/libComputerSystemProvider.so";
 
 // How a program ended, and what it wrote.
 struct Ended {

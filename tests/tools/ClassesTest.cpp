@@ -201,12 +201,4 @@ TEST_F(ClassesTest, ClassWithoutObjectsIsSaid)
                          "ZUMLO_SensorSystemDevice\n");
 }
 
-TEST_F(ClassesTest, MachineThatCannotBeReadIsTheReasonForAnEmptyAnswer)
-{
-    const Ended ended = run({"list", "ZUMLO_SensorSystemDevice"},
-        {.environment = {{"VORN_INSTRUMENTATION", "abacus"}}});
-    EXPECT_EQ(ended.code, 1);
-    EXPECT_THAT(ended.err, HasSubstr("\"abacus\""));
-}
-
 } // namespace

@@ -94,8 +94,9 @@ TEST_F(FailureTest, EveryKindOfBadModelIsAFailure)
 
 TEST_F(FailureTest, InstrumentationThatCannotBeUsedIsTheReason)
 {
-    for (const std::vector<std::string>& arguments : std::vector<std::vector<std::string>>{
-             {"list"}, {"list", "--json"}, {"get", "CPU 1"}, {"record"}, {"walk", "CPU 1"}}) {
+    for (const std::vector<std::string>& arguments : std::vector<std::vector<std::string>>{{"list"},
+             {"list", "--json"}, {"list", "ZUMLO_SensorSystemDevice"}, {"get", "CPU 1"}, {"record"},
+             {"walk"}, {"walk", "CPU 1"}}) {
         const Ended ended = run(arguments, {.environment = {{"VORN_INSTRUMENTATION", "abacus"}}});
         EXPECT_EQ(ended.code, 1);
         EXPECT_EQ(ended.out, "");
@@ -127,12 +128,11 @@ TEST_F(FailureTest, ToolWithoutItsProviderSaysWhereItLooked)
 
 TEST_F(FailureTest, InstalledToolFindsItsProviderByItsOwnPlace)
 {
-    const std::string library = SENSOR_PROFILE_BINARY_DIR "/lib/libSensorProfileProvider.so";
     const std::string moved = install();
     for (const char* const place : {"lib", "lib/cmpi"}) {
         std::filesystem::create_directories(folder_.path() / place);
         const auto copy = folder_.path() / place / "libSensorProfileProvider.so";
-        std::filesystem::copy_file(library, copy);
+        std::filesystem::copy_file(sensorLibrary, copy);
         EXPECT_EQ(run({"list", "--model", smallModel()}, {.program = moved}).code, 0);
         std::filesystem::remove(copy);
     }
@@ -142,9 +142,8 @@ TEST_F(FailureTest, ToolWithoutItsClassesSaysWhichFileIsMissing)
 {
     const std::string moved = install();
     std::filesystem::remove_all(folder_.path() / "share");
-    const std::string library = SENSOR_PROFILE_BINARY_DIR "/lib/libSensorProfileProvider.so";
     const Ended ended =
-        run({"list", "--model", smallModel(), "--provider", library}, {.program = moved});
+        run({"list", "--model", smallModel(), "--provider", sensorLibrary}, {.program = moved});
     EXPECT_EQ(ended.code, 1);
     EXPECT_EQ(ended.out, "");
     EXPECT_EQ(ended.err, "sensorctl: " + folder_.path().string() +
@@ -156,9 +155,8 @@ TEST_F(FailureTest, ClassesThatCannotBeCompiledAreTheReason)
     const std::string moved = install();
     const auto file = folder_.path() / "share" / "sensor-profile" / "host.mof";
     std::ofstream(file) << "class {";
-    const std::string library = SENSOR_PROFILE_BINARY_DIR "/lib/libSensorProfileProvider.so";
     const Ended ended =
-        run({"list", "--model", smallModel(), "--provider", library}, {.program = moved});
+        run({"list", "--model", smallModel(), "--provider", sensorLibrary}, {.program = moved});
     EXPECT_EQ(ended.code, 1);
     EXPECT_EQ(ended.out, "");
     EXPECT_THAT(ended.err, StartsWith("sensorctl: " + file.string() + ":1:7: "));
@@ -166,12 +164,13 @@ TEST_F(FailureTest, ClassesThatCannotBeCompiledAreTheReason)
 
 TEST_F(FailureTest, ProviderOptionTakesAnyPath)
 {
-    const std::string library = SENSOR_PROFILE_BINARY_DIR "/lib/libSensorProfileProvider.so";
-    const std::string relative = std::filesystem::relative(library).string();
+    const std::string relative = std::filesystem::relative(sensorLibrary).string();
     EXPECT_EQ(run({"list", "--model", smallModel(), "--provider", relative}).code, 0);
     const Ended ended = run({"list", "--model", smallModel(), "--provider", "libc.so.6"});
     EXPECT_EQ(ended.code, 1); // looked for here, not among the system's libraries
     EXPECT_THAT(ended.err, HasSubstr("/libc.so.6: cannot open shared object file"));
+    EXPECT_EQ(run({"walk", "--model", smallModel(), "--provider", systemLibrary}).err,
+        "sensorctl: " + systemLibrary + ": no factory SensorProfileProvider_Create_InstanceMI\n");
 }
 
 } // namespace

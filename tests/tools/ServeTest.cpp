@@ -170,17 +170,16 @@ TEST_F(ServeTest, ProviderThatIsNoneIsToldAtTheStart)
         "sensorctl: /none.so: cannot open shared object file: No such file or directory\n");
     EXPECT_EQ(problem("/bin/ls"),
         "sensorctl: /bin/ls: cannot dynamically load position-independent executable\n");
-    const std::string other = SENSOR_PROFILE_BINARY_DIR "/lib/libComputerSystemProvider.so";
-    EXPECT_EQ(problem(other),
-        "sensorctl: " + other + ": no factory SensorProfileProvider_Create_InstanceMI\n");
+    EXPECT_EQ(problem(systemLibrary),
+        "sensorctl: " + systemLibrary + ": no factory SensorProfileProvider_Create_InstanceMI\n");
 }
 
 TEST_F(ServeTest, OptionsThatMakeNoSenseAreWrongUsage)
 {
     for (const std::vector<std::string>& arguments :
         {std::vector<std::string>{"--certificate", "x"}, {"--key", "x"}, {"--address", "localhost"},
-            {"--port", "65536"}, {"--port", "-1"}, {"--workers", "0"}, {"--max-body", "lots"},
-            {"--grace-period", "0"}, {"--unknown"}, {"positional"}}) {
+            {"--port", "65536"}, {"--port", "-1"}, {"--port", "http"}, {"--workers", "0"},
+            {"--max-body", "lots"}, {"--grace-period", "0"}, {"--unknown"}, {"positional"}}) {
         const Ended ended = failing(withModel(arguments));
         EXPECT_EQ(ended.code, 2) << arguments[0] << ended.err;
         EXPECT_THAT(ended.err, AllOf(StartsWith("sensorctl: "),

@@ -121,8 +121,7 @@ protected:
     WalkWithoutCompanionTest()
     {
         std::filesystem::create_directory(folder_.path() / "lib");
-        std::filesystem::copy_file(SENSOR_PROFILE_BINARY_DIR "/lib/libSensorProfileProvider.so",
-            folder_.path() / "lib" / "libSensorProfileProvider.so");
+        std::filesystem::copy(sensorLibrary, folder_.path() / "lib");
     }
 
     const std::string moved_ = install();
@@ -144,23 +143,6 @@ TEST_F(WalkWithoutCompanionTest, SensorsAreShownWithWhatElseThereIs)
     EXPECT_THAT(ended.out, AllOf(StartsWith("Fan:/board/fan1 "), HasSubstr(capabilities),
                                Not(HasSubstr("ZUMLO_SensorSystemDevice"))));
     EXPECT_EQ(run({"list", "--model", twoSensors()}, {.program = moved_}).code, 0);
-}
-
-TEST_F(WalkTest, LibraryWithoutTheFactoriesIsSaid)
-{
-    const std::string other = SENSOR_PROFILE_BINARY_DIR "/lib/libComputerSystemProvider.so";
-    const Ended ended = walked({"--provider", other});
-    EXPECT_EQ(ended.code, 1);
-    EXPECT_EQ(ended.out, "");
-    EXPECT_EQ(ended.err,
-        "sensorctl: " + other + ": no factory SensorProfileProvider_Create_InstanceMI\n");
-}
-
-TEST_F(WalkTest, MachineThatCannotBeReadIsSaid)
-{
-    const Ended ended = run({"walk"}, {.environment = {{"VORN_INSTRUMENTATION", "abacus"}}});
-    EXPECT_EQ(ended.code, 1);
-    EXPECT_THAT(ended.err, HasSubstr("\"abacus\""));
 }
 
 } // namespace

@@ -1,19 +1,12 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The broker that fails on demand does what tests rely on.
+// The broker that fails on demand; the sweeps over the providers show that each call can fail.
 
 #include "tests/support/FaultyBroker.h"
 
-#include "host/broker/BrokerUpcalls.h"
-#include "host/broker/CollectedResult.h"
-#include "host/broker/Enumeration.h"
-#include "host/broker/Instance.h"
-#include "host/broker/Result.h"
 #include "tests/host/broker/BrokerTest.h"
 
-#include <map>
 #include <thread>
-#include <vector>
 
 namespace HostTests {
 
@@ -21,123 +14,7 @@ using Testing::BrokerCall;
 using Testing::FaultManner;
 using Testing::FaultyBroker;
 
-namespace {
-
-class TwoObjects : public Host::BrokerUpcalls {
-    Host::Enumeration& enumerateInstanceNames(
-        const Host::Context&, const Host::ObjectPath& path) override
-    {
-        const std::vector twice(2, Host::Value::of(path));
-        return Host::Enumeration::make(Host::Arena::required(), twice);
-    }
-    Host::Enumeration& enumerateInstances(
-        const Host::Context&, const Host::ObjectPath& path, const char**) override
-    {
-        Host::Arena& arena = Host::Arena::required();
-        const std::vector twice(2, Host::Value::of(Host::Instance::make(arena, path, nullptr)));
-        return Host::Enumeration::make(arena, twice);
-    }
-};
-
-} // namespace
-
-class FaultyBrokerTest : public BrokerTest {
-protected:
-    FaultyBrokerTest() { broker.setUpcalls(&upcalls); }
-
-    // A provider that makes every call that can fail, and looks at nothing it gets back
-    // without care.
-    void runProvider(const CMPIBroker* to, const CMPIObjectPath* ref, const CMPIResult* answer)
-    {
-        CMPIStatus status{CMPI_RC_OK, nullptr};
-        const auto characters = [](CMPIString* text) {
-            return text == nullptr ? nullptr : CMGetCharPtr(text);
-        };
-        const char* const nameSpace = characters(CMGetNameSpace(ref, &status));
-        characters(CMGetClassName(ref, &status));
-        characters(CMGetHostname(ref, &status));
-        if (CMGetKeyCount(ref, &status) > 0)
-            CMGetKeyAt(ref, 0, nullptr, &status);
-        CMGetKey(ref, "DeviceID", &status);
-        CMTraceMessage(to, CMPI_LEV_INFO, "C", "T", nullptr);
-        if (CMPIObjectPath* const made = CMNewObjectPath(to, nameSpace, "Made", &status)) {
-            CMSetNameSpace(made, "root/other");
-            CMSetHostname(made, "host");
-            CMAddKey(made, "DeviceID", "1", CMPI_chars);
-            if (CMPIInstance* const object = CMNewInstance(to, made, &status)) {
-                const char* keys[] = {"DeviceID", nullptr};
-                CMSetPropertyFilter(object, nullptr, keys);
-                if (CMPIArray* const list = CMNewArray(to, 1, CMPI_string, &status)) {
-                    if (CMPIString* const text = CMNewString(to, "text", &status))
-                        CMSetArrayElementAt(list, 0, &text, CMPI_string);
-                    CMSetProperty(object, "List", &list, CMPI_stringA);
-                }
-                CMGetProperty(object, "List", &status);
-                CMGetObjectPath(object, &status);
-                CMReturnInstance(answer, object);
-            }
-            CMReturnObjectPath(answer, made);
-        }
-        const CMPIContext* const context = request.context().handle();
-        CBEnumInstances(to, context, ref, nullptr, &status);
-        CBGetInstance(to, context, ref, nullptr, &status);
-        if (CMPIEnumeration* const names = CBEnumInstanceNames(to, context, ref, &status))
-            while (CMHasNext(names, &status)) {
-                const CMPIData next = CMGetNext(names, &status);
-                if ((next.state & CMPI_nullValue) != 0)
-                    break;
-                characters(CMGetClassName(next.value.ref, &status));
-            }
-        CMReturnDone(answer);
-    }
-
-    void runProvider(FaultyBroker& faulty)
-    {
-        Host::CollectedResult collected;
-        Host::Result result(collected);
-        Host::ObjectPath& ref = request.makePath("root/cimv2", "Test_Class");
-        ref.addKey("DeviceID", Host::Value::text(request.arena(), "1"));
-        runProvider(faulty.handle(), faulty.watch(ref.handle()), faulty.watch(result.handle()));
-    }
-
-    TwoObjects upcalls;
-};
-
-TEST_F(FaultyBrokerTest, CountsEveryKindOfCall)
-{
-    FaultyBroker faulty(broker);
-    runProvider(faulty);
-    for (const BrokerCall call : Testing::allBrokerCalls())
-        EXPECT_GE(faulty.count(call), 1U) << nameOf(call);
-    EXPECT_EQ(faulty.count(BrokerCall::hasNext), 3U);
-    EXPECT_EQ(faulty.count(BrokerCall::getNext), 2U);
-    EXPECT_EQ(faulty.count(BrokerCall::newObjectPath), 1U);
-    EXPECT_EQ(faulty.calls().front(), BrokerCall::getNameSpace);
-    EXPECT_EQ(faulty.calls().back(), BrokerCall::returnDone);
-    EXPECT_EQ(faulty.fired(), 0U);
-    faulty.reset();
-    EXPECT_TRUE(faulty.calls().empty());
-    EXPECT_EQ(faulty.count(BrokerCall::hasNext), 0U);
-}
-
-TEST_F(FaultyBrokerTest, ACarefulProviderSurvivesEveryFault)
-{
-    std::map<BrokerCall, unsigned> counted;
-    {
-        FaultyBroker faulty(broker);
-        runProvider(faulty);
-        for (const BrokerCall call : Testing::allBrokerCalls())
-            counted[call] = faulty.count(call);
-    }
-    for (const BrokerCall call : Testing::allBrokerCalls())
-        for (const FaultManner manner : Testing::mannersOf(call))
-            for (unsigned n = 1; n <= counted[call]; ++n) {
-                FaultyBroker faulty(broker);
-                faulty.plan({call, n, manner});
-                runProvider(faulty);
-                EXPECT_EQ(faulty.fired(), 1U) << nameOf(call) << ' ' << n << ' ' << nameOf(manner);
-            }
-}
+using FaultyBrokerTest = BrokerTest;
 
 TEST_F(FaultyBrokerTest, TheNthCallFailsAndNoOther)
 {

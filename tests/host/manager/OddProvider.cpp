@@ -5,47 +5,27 @@
 #include <cmpidt.h>
 #include <cmpift.h>
 
+#include <type_traits>
+
 namespace {
 
 Testing::OddProviderReport report;
 
-CMPIStatus countCleanup(const CMPIContext* context, CMPIrc answer)
+// Makes a provider's management interface with a table of this version, whose cleanup answers
+// with this code.
+template <typename MI, CMPIVersion version = 200, CMPIrc cleanupCode = CMPI_RC_OK>
+MI* make()
 {
-    ++report.cleanedUp;
-    if (context != nullptr && context->hdl != nullptr)
-        ++report.cleanedUpWithContext;
-    return {answer, nullptr};
-}
-
-CMPIStatus leave(CMPIInstanceMI*, const CMPIContext* context, CMPIBoolean)
-{
-    return countCleanup(context, CMPI_RC_OK);
-}
-
-CMPIStatus leaveAssociation(CMPIAssociationMI*, const CMPIContext* context, CMPIBoolean)
-{
-    return countCleanup(context, CMPI_RC_OK);
-}
-
-CMPIStatus stay(CMPIInstanceMI*, const CMPIContext* context, CMPIBoolean)
-{
-    return countCleanup(context, CMPI_RC_NEVER_UNLOAD);
-}
-
-template <typename Table, typename Cleanup>
-Table tableWith(CMPIVersion version, Cleanup cleanup)
-{
-    Table table{};
+    static std::remove_const_t<std::remove_pointer_t<decltype(MI::ft)>> table{};
     table.ftVersion = version;
-    table.cleanup = cleanup;
-    return table;
-}
-
-template <typename MI, typename Table>
-MI* made(MI& mi, const Table& table)
-{
+    table.cleanup = [](MI*, const CMPIContext* context, CMPIBoolean) {
+        ++report.cleanedUp;
+        if (context != nullptr && context->hdl != nullptr)
+            ++report.cleanedUpWithContext;
+        return CMPIStatus{cleanupCode, nullptr};
+    };
+    static MI mi{nullptr, &table};
     ++report.created;
-    mi.ft = &table;
     return &mi;
 }
 
@@ -62,37 +42,29 @@ extern "C" {
 [[gnu::visibility("default")]] CMPIInstanceMI* Calling_Create_InstanceMI(
     const CMPIBroker* broker, const CMPIContext* context, CMPIStatus*)
 {
-    static CMPIInstanceMI mi{};
-    static const auto table = tableWith<CMPIInstanceMIFT>(200, leave);
     CMPIStatus status{CMPI_RC_OK, nullptr};
     broker->bft->enumerateInstanceNames(
         broker, context, broker->eft->newObjectPath(broker, "root/cimv2", "Box", nullptr), &status);
     report.upcall = status.rc;
-    return made(mi, table);
+    return make<CMPIInstanceMI>();
 }
 
 [[gnu::visibility("default")]] CMPIInstanceMI* Leaving_Create_InstanceMI(
     const CMPIBroker*, const CMPIContext*, CMPIStatus*)
 {
-    static CMPIInstanceMI mi{};
-    static const auto table = tableWith<CMPIInstanceMIFT>(200, leave);
-    return made(mi, table);
+    return make<CMPIInstanceMI>();
 }
 
 [[gnu::visibility("default")]] CMPIAssociationMI* Leaving_Create_AssociationMI(
     const CMPIBroker*, const CMPIContext*, CMPIStatus*)
 {
-    static CMPIAssociationMI mi{};
-    static const auto table = tableWith<CMPIAssociationMIFT>(200, leaveAssociation);
-    return made(mi, table);
+    return make<CMPIAssociationMI>();
 }
 
 [[gnu::visibility("default")]] CMPIInstanceMI* Staying_Create_InstanceMI(
     const CMPIBroker*, const CMPIContext*, CMPIStatus*)
 {
-    static CMPIInstanceMI mi{};
-    static const auto table = tableWith<CMPIInstanceMIFT>(200, stay);
-    return made(mi, table);
+    return make<CMPIInstanceMI, 200, CMPI_RC_NEVER_UNLOAD>();
 }
 
 [[gnu::visibility("default")]] CMPIInstanceMI* Refusing_Create_InstanceMI(
@@ -112,9 +84,7 @@ extern "C" {
 [[gnu::visibility("default")]] CMPIInstanceMI* Ancient_Create_InstanceMI(
     const CMPIBroker*, const CMPIContext*, CMPIStatus*)
 {
-    static CMPIInstanceMI mi{};
-    static const auto table = tableWith<CMPIInstanceMIFT>(86, leave);
-    return made(mi, table);
+    return make<CMPIInstanceMI, 86>();
 }
 
 } // extern "C"

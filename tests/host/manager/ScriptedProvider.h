@@ -73,20 +73,13 @@ inline const CMPIInstanceMIFT ScriptedProvider::instanceTable = {
     .enumerateInstances =
         [](CMPIInstanceMI* mi, const CMPIContext* context, const CMPIResult* result,
             const CMPIObjectPath* path, const char** properties) {
-            return pass(mi, {.operation = "enumerateInstances",
-                                .context = context,
-                                .result = result,
-                                .path = path,
-                                .properties = properties});
+            return pass(
+                mi, {"enumerateInstances", context, result, path, {}, {}, {}, {}, properties});
         },
     .getInstance =
         [](CMPIInstanceMI* mi, const CMPIContext* context, const CMPIResult* result,
             const CMPIObjectPath* path, const char** properties) {
-            return pass(mi, {.operation = "getInstance",
-                                .context = context,
-                                .result = result,
-                                .path = path,
-                                .properties = properties});
+            return pass(mi, {"getInstance", context, result, path, {}, {}, {}, {}, properties});
         },
     .createInstance = nullptr, // what is left out is not supported
     .modifyInstance = nullptr,

@@ -124,41 +124,6 @@ TEST_F(OpenEnumerationsTest, PathsAreNotPulledFromInstances)
     EXPECT_FALSE(isOpen(context));
 }
 
-TEST_F(OpenEnumerationsTest, WhatIsClosedIsGone)
-{
-    const std::string context = open(5);
-    enumerations_.close(context, Owner);
-    EXPECT_FALSE(isOpen(context));
-    EXPECT_THAT(
-        refusalOf([&] { enumerations_.close(context, Owner); }), testing::StartsWith("21: "));
-    EXPECT_THAT(refusalOf([&] { enumerations_.close("", Owner); }), testing::StartsWith("21: "));
-}
-
-TEST_F(OpenEnumerationsTest, ItsTimeBeginsAnewWithEachPull)
-{
-    const std::string context = open(5, 10s);
-    for (int i = 0; i < 3; ++i) {
-        now_ += 9s;
-        EXPECT_TRUE(isOpen(context));
-    }
-    now_ += 10s;
-    EXPECT_FALSE(isOpen(context));
-}
-
-TEST_F(OpenEnumerationsTest, ThereAreNoMoreThanTheLimit)
-{
-    open(1);
-    open(1, 20s);
-    const std::string last = open(1);
-    EXPECT_EQ(refusalOf([&] { open(1); }), "27: there are 3 open enumerations already");
-    enumerations_.close(last, Owner);
-    open(1);
-    EXPECT_THAT(refusalOf([&] { open(1); }), testing::StartsWith("27: "));
-    now_ += 20s; // one of them is over
-    open(1);
-    EXPECT_THAT(refusalOf([&] { open(1); }), testing::StartsWith("27: "));
-}
-
 TEST_F(OpenEnumerationsTest, TheyHoldNoMoreThanTheLimit)
 {
     const std::string first = open(60);

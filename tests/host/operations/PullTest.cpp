@@ -141,7 +141,12 @@ TEST_F(PullTest, TooManyAreRefused)
     const std::string context = contextIn(open(1));
     EXPECT_EQ(errorIn(open(1)), "");
     EXPECT_EQ(errorIn(open(1)), "27: there are 2 open enumerations already");
-    EXPECT_EQ(errorIn(ask("CloseEnumeration", valueOf("EnumerationContext", context))), "");
+    const std::string toClose = valueOf("EnumerationContext", context);
+    EXPECT_EQ(errorIn(ask("CloseEnumeration", toClose)), "");
+    EXPECT_THAT(errorIn(ask("CloseEnumeration", toClose)), StartsWith("21"));
+    EXPECT_EQ(errorIn(open(1)), "");
+    EXPECT_THAT(errorIn(open(1)), StartsWith("27"));
+    manager_.wait(60s); // their time is over
     EXPECT_EQ(errorIn(open(1)), "");
 }
 

@@ -88,14 +88,6 @@ const CMPIObjectPathFT& pathTable()
     return table;
 }
 
-CMPIData data(CMPIType type)
-{
-    CMPIData made{};
-    made.type = type;
-    made.state = CMPI_keyValue;
-    return made;
-}
-
 } // namespace
 
 FakeString::FakeString(std::optional<std::string> characters) : text(std::move(characters))
@@ -125,89 +117,18 @@ FakePath& FakePath::key(const std::string& name, const CMPIData& value)
 
 FakePath& FakePath::text(const std::string& name, std::optional<std::string> value)
 {
-    CMPIData made = data(CMPI_string);
-    made.value.string = texts_.emplace_back(std::move(value)).get();
-    return key(name, made);
-}
-
-FakePath& FakePath::chars(const std::string& name, const char* value)
-{
-    CMPIData made = data(CMPI_chars);
-    made.value.chars = const_cast<char*>(value);
-    return key(name, made);
-}
-
-FakePath& FakePath::reference(const std::string& name, CMPIObjectPath* value)
-{
-    CMPIData made = data(CMPI_ref);
-    made.value.ref = value;
-    return key(name, made);
+    return key(name, valueOf(CMPI_string, texts_.emplace_back(std::move(value)).get()));
 }
 
 FakePath& FakePath::dateTime(const std::string& name, std::optional<std::string> form)
 {
-    CMPIData made = data(CMPI_dateTime);
-    made.value.dateTime = dateTimes_.emplace_back(std::move(form)).get();
-    return key(name, made);
-}
-
-CMPIData boolean(bool value)
-{
-    CMPIData made = data(CMPI_boolean);
-    made.value.boolean = value ? 1 : 0;
-    return made;
-}
-
-CMPIData signedInteger(CMPIType type, CMPISint64 value)
-{
-    CMPIData made = data(type);
-    if (type == CMPI_sint8)
-        made.value.sint8 = static_cast<CMPISint8>(value);
-    else if (type == CMPI_sint16)
-        made.value.sint16 = static_cast<CMPISint16>(value);
-    else if (type == CMPI_sint32)
-        made.value.sint32 = static_cast<CMPISint32>(value);
-    else
-        made.value.sint64 = value;
-    return made;
-}
-
-CMPIData unsignedInteger(CMPIType type, CMPIUint64 value)
-{
-    CMPIData made = data(type);
-    if (type == CMPI_uint8)
-        made.value.uint8 = static_cast<CMPIUint8>(value);
-    else if (type == CMPI_uint16)
-        made.value.uint16 = static_cast<CMPIUint16>(value);
-    else if (type == CMPI_uint32)
-        made.value.uint32 = static_cast<CMPIUint32>(value);
-    else
-        made.value.uint64 = value;
-    return made;
-}
-
-CMPIData real(CMPIType type, double value)
-{
-    CMPIData made = data(type);
-    if (type == CMPI_real32)
-        made.value.real32 = static_cast<CMPIReal32>(value);
-    else
-        made.value.real64 = value;
-    return made;
-}
-
-CMPIData character(CMPIChar16 value)
-{
-    CMPIData made = data(CMPI_char16);
-    made.value.char16 = value;
-    return made;
+    return key(name, valueOf(CMPI_dateTime, dateTimes_.emplace_back(std::move(form)).get()));
 }
 
 CMPIData poisoned(CMPIType type, CMPIValueState state)
 {
-    CMPIData made = data(type);
+    CMPIData made = valueOf(type, CMPIUint64{1});
     made.state = state;
-    made.value.uint64 = 1;
     return made;
 }
 

@@ -8,12 +8,24 @@
 #include <cmpidt.h>
 #include <cmpift.h>
 
+#include <cstring>
 #include <deque>
 #include <optional>
 #include <string>
 #include <vector>
 
 namespace Testing {
+
+// Returns a key's value of a type, whose member of CMPIValue is a number or a pointer.
+template <typename Member>
+CMPIData valueOf(CMPIType type, Member member)
+{
+    CMPIData data{};
+    data.type = type;
+    data.state = CMPI_keyValue;
+    std::memcpy(&data.value, &member, sizeof member);
+    return data;
+}
 
 // A broker's string. Without text its character pointer is null.
 class FakeString {
@@ -61,8 +73,14 @@ public:
     // Each returns the path, so that keys can be listed in a row.
     FakePath& key(const std::string& name, const CMPIData& value);
     FakePath& text(const std::string& name, std::optional<std::string> value);
-    FakePath& chars(const std::string& name, const char* value);
-    FakePath& reference(const std::string& name, CMPIObjectPath* value);
+    FakePath& chars(const std::string& name, const char* value)
+    {
+        return key(name, valueOf(CMPI_chars, value));
+    }
+    FakePath& reference(const std::string& name, CMPIObjectPath* value)
+    {
+        return key(name, valueOf(CMPI_ref, value));
+    }
     FakePath& dateTime(const std::string& name, std::optional<std::string> form);
 
     struct Key {
@@ -85,12 +103,6 @@ private:
     std::deque<FakeString> texts_;
     std::deque<FakeDateTime> dateTimes_;
 };
-
-CMPIData boolean(bool value);
-CMPIData signedInteger(CMPIType type, CMPISint64 value);
-CMPIData unsignedInteger(CMPIType type, CMPIUint64 value);
-CMPIData real(CMPIType type, double value);
-CMPIData character(CMPIChar16 value);
 
 // A value that must not be looked at: its pointer leads nowhere.
 CMPIData poisoned(CMPIType type, CMPIValueState state);

@@ -7,6 +7,7 @@
 
 #include <deque>
 #include <limits>
+#include <type_traits>
 #include <vector>
 
 namespace {
@@ -15,6 +16,7 @@ using namespace Testing;
 using Vorn::isObjPathsEqual;
 
 constexpr auto sensorClass = "ZUMLO_NumericSensor";
+const CMPIData yes = valueOf(CMPI_boolean, CMPIBoolean{1});
 
 // Equality has no direction: both are tried.
 bool equal(const FakePath& a, const FakePath& b, bool comparesReferences = true)
@@ -130,50 +132,63 @@ TEST(ObjectPathEqualityTest, BothFormsOfATextAreEqual)
     EXPECT_FALSE(equal(a, c.chars("DeviceID", "fan2")));
 }
 
+template <typename Integer>
+void expectComparedByValue(CMPIType type)
+{
+    const CMPIData five = valueOf(CMPI_sint64, CMPISint64{5});
+    EXPECT_TRUE(equalValues(five, valueOf(type, Integer{5})));
+    EXPECT_FALSE(equalValues(five, valueOf(type, Integer{6})));
+    if constexpr (std::is_signed_v<Integer>) {
+        EXPECT_TRUE(equalValues(valueOf(CMPI_sint64, CMPISint64{-5}), valueOf(type, Integer{-5})));
+        EXPECT_FALSE(equalValues(five, valueOf(type, Integer{-5})));
+    }
+}
+
 TEST(ObjectPathEqualityTest, IntegersOfAnyTypeAreComparedByValue)
 {
-    const auto five = signedInteger(CMPI_sint64, 5);
-    for (const auto type :
-        std::vector<CMPIType>{CMPI_uint8, CMPI_uint16, CMPI_uint32, CMPI_uint64}) {
-        EXPECT_TRUE(equalValues(five, unsignedInteger(type, 5)));
-        EXPECT_FALSE(equalValues(five, unsignedInteger(type, 6)));
-    }
-    for (const auto type :
-        std::vector<CMPIType>{CMPI_sint8, CMPI_sint16, CMPI_sint32, CMPI_sint64}) {
-        EXPECT_TRUE(equalValues(five, signedInteger(type, 5)));
-        EXPECT_TRUE(equalValues(signedInteger(CMPI_sint64, -5), signedInteger(type, -5)));
-        EXPECT_FALSE(equalValues(five, signedInteger(type, -5)));
-    }
+    expectComparedByValue<CMPIUint8>(CMPI_uint8);
+    expectComparedByValue<CMPIUint16>(CMPI_uint16);
+    expectComparedByValue<CMPIUint32>(CMPI_uint32);
+    expectComparedByValue<CMPIUint64>(CMPI_uint64);
+    expectComparedByValue<CMPISint8>(CMPI_sint8);
+    expectComparedByValue<CMPISint16>(CMPI_sint16);
+    expectComparedByValue<CMPISint32>(CMPI_sint32);
+    expectComparedByValue<CMPISint64>(CMPI_sint64);
 }
 
 TEST(ObjectPathEqualityTest, ANegativeIntegerIsNotTheLargePositiveOfTheSameBits)
 {
-    EXPECT_FALSE(equalValues(signedInteger(CMPI_sint64, -1),
-        unsignedInteger(CMPI_uint64, std::numeric_limits<CMPIUint64>::max())));
+    EXPECT_FALSE(equalValues(valueOf(CMPI_sint64, CMPISint64{-1}),
+        valueOf(CMPI_uint64, std::numeric_limits<CMPIUint64>::max())));
 }
 
 TEST(ObjectPathEqualityTest, BooleansRealsAndCharactersAreComparedByValue)
 {
-    EXPECT_TRUE(equalValues(boolean(true), boolean(true)));
-    EXPECT_FALSE(equalValues(boolean(true), boolean(false)));
-    EXPECT_TRUE(equalValues(real(CMPI_real64, 1.5), real(CMPI_real64, 1.5)));
-    EXPECT_TRUE(equalValues(real(CMPI_real64, 1.5), real(CMPI_real32, 1.5)));
-    EXPECT_FALSE(equalValues(real(CMPI_real64, 1.5), real(CMPI_real64, 2.5)));
-    EXPECT_TRUE(equalValues(character(0x30BB), character(0x30BB)));
-    EXPECT_FALSE(equalValues(character(0x30BB), character(0x30BC)));
+    EXPECT_TRUE(equalValues(yes, yes));
+    EXPECT_FALSE(equalValues(yes, valueOf(CMPI_boolean, CMPIBoolean{0})));
+    EXPECT_TRUE(
+        equalValues(valueOf(CMPI_real64, CMPIReal64{1.5}), valueOf(CMPI_real64, CMPIReal64{1.5})));
+    EXPECT_TRUE(
+        equalValues(valueOf(CMPI_real64, CMPIReal64{1.5}), valueOf(CMPI_real32, CMPIReal32{1.5})));
+    EXPECT_FALSE(
+        equalValues(valueOf(CMPI_real64, CMPIReal64{1.5}), valueOf(CMPI_real64, CMPIReal64{2.5})));
+    EXPECT_TRUE(equalValues(
+        valueOf(CMPI_char16, CMPIChar16{0x30BB}), valueOf(CMPI_char16, CMPIChar16{0x30BB})));
+    EXPECT_FALSE(equalValues(
+        valueOf(CMPI_char16, CMPIChar16{0x30BB}), valueOf(CMPI_char16, CMPIChar16{0x30BC})));
 }
 
 TEST(ObjectPathEqualityTest, ABooleanIsTrueWhateverItsBits)
 {
-    CMPIData odd = boolean(true);
+    CMPIData odd = yes;
     odd.value.boolean = 2;
-    EXPECT_TRUE(equalValues(odd, boolean(true)));
+    EXPECT_TRUE(equalValues(odd, yes));
 }
 
 TEST(ObjectPathEqualityTest, ValuesOfDifferentTypesAreDifferent)
 {
-    const std::vector<CMPIData> ones = {
-        boolean(true), unsignedInteger(CMPI_uint32, 1), real(CMPI_real64, 1), character(1)};
+    const std::vector<CMPIData> ones = {yes, valueOf(CMPI_uint32, CMPIUint32{1}),
+        valueOf(CMPI_real64, CMPIReal64{1}), valueOf(CMPI_char16, CMPIChar16{1})};
     for (std::size_t a = 0; a < ones.size(); ++a)
         for (std::size_t b = 0; b < a; ++b)
             EXPECT_FALSE(equalValues(ones[a], ones[b])) << a << " and " << b;
@@ -232,7 +247,7 @@ TEST(ObjectPathEqualityTest, BadValuesEqualNothing)
 {
     const auto bad = poisoned(CMPI_string, CMPI_badValue);
     EXPECT_FALSE(equalValues(bad, bad));
-    EXPECT_FALSE(equalValues(bad, boolean(true)));
+    EXPECT_FALSE(equalValues(bad, yes));
 }
 
 TEST(ObjectPathEqualityTest, TypesThatNoKeyCanHaveEqualNothing)
