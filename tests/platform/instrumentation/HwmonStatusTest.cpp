@@ -67,10 +67,59 @@ const Row rows[] = {
             {"in1_crit", "0"}},
         1},
     {"aFanWhoseMinimumNobodySetMayStandStill", {{"fan1_input", "0"}, {"fan1_min", "0"}}, 1},
+    {"aZeroBesideASetEndIsMeant", {{"in1_input", "0"}, {"in1_min", "0"}, {"in1_max", "85"}}, 22},
+    {"pairsOfLimitsDoNotTouchEachOther",
+        {{"in1_input", "1000"}, {"in1_min", "0"}, {"in1_max", "0"}, {"in1_crit", "2000"}}, 1},
+    {"withinAllLimits",
+        {{"temp1_input", "50000"}, {"temp1_min", "10000"}, {"temp1_max", "80000"},
+            {"temp1_lcrit", "0"}, {"temp1_crit", "90000"}, {"temp1_emergency", "100000"}},
+        1},
+    {"alarmsNotRaised",
+        {{"temp1_input", "50000"}, {"temp1_alarm", "0"}, {"temp1_min_alarm", "0"},
+            {"temp1_max_alarm", "0"}, {"temp1_crit_alarm", "0"}},
+        1},
+    {"aboveCrit", {{"temp1_input", "95001"}, {"temp1_crit", "95000"}}, 26},
+    {"aboveEmergencyWithoutCrit", {{"temp1_input", "120000"}, {"temp1_emergency", "100000"}}, 1},
+    {"belowLcrit", {{"in0_input", "999"}, {"in0_lcrit", "1000"}, {"in0_crit", "2000"}}, 25},
+    {"justBelowMax", {{"temp1_input", "79999"}, {"temp1_max", "80000"}}, 1},
+    {"justAboveMin", {{"temp1_input", "10001"}, {"temp1_min", "10000"}}, 1},
+    {"plainAlarmOfAFanAtItsMinimum",
+        {{"fan1_input", "600"}, {"fan1_min", "600"}, {"fan1_alarm", "1"}}, 22},
+    {"faultBeforeDisabled", {{"temp1_input", "50000"}, {"temp1_fault", "1"}, {"temp1_enable", "0"}},
+        13},
+    {"faultBeforeCritical",
+        {{"temp1_input", "95000"}, {"temp1_fault", "1"}, {"temp1_crit", "90000"}}, 13},
+    {"disabledBeforeCritical",
+        {{"temp1_input", "95000"}, {"temp1_enable", "0"}, {"temp1_crit", "90000"}}, 16},
+    {"criticalHighBeforeCriticalLow",
+        {{"temp1_input", "50000"}, {"temp1_lcrit_alarm", "1"}, {"temp1_crit_alarm", "1"}}, 26},
+    {"criticalLowBeforeWarningHigh",
+        {{"temp1_input", "50000"}, {"temp1_max_alarm", "1"}, {"temp1_lcrit_alarm", "1"}}, 25},
+    {"warningHighBeforeWarningLow",
+        {{"temp1_input", "50000"}, {"temp1_min_alarm", "1"}, {"temp1_max_alarm", "1"}}, 23},
+    {"warningLowBeforePlain",
+        {{"temp1_input", "50000"}, {"temp1_alarm", "1"}, {"temp1_min_alarm", "1"}}, 22},
 };
 
 INSTANTIATE_TEST_SUITE_P(EveryRow, HwmonStatusTest, testing::ValuesIn(rows),
     [](const auto& row) { return row.param.name; });
+
+TEST_F(HwmonTest, EveryLimitAlarmAndSwitchAddsItsPossibleState)
+{
+    const std::map<std::string, std::vector<unsigned>> states = {{"temp1_min", {1, 22}},
+        {"temp1_max", {1, 23}}, {"temp1_lcrit", {1, 25}}, {"temp1_crit", {1, 26}},
+        {"temp1_emergency", {1}}, {"temp1_alarm", {1, 21}}, {"temp1_min_alarm", {1, 22}},
+        {"temp1_max_alarm", {1, 23}}, {"temp1_lcrit_alarm", {1, 25}}, {"temp1_crit_alarm", {1, 26}},
+        {"temp1_emergency_alarm", {1, 26}}, {"temp1_enable", {1, 16}}};
+    Attributes all{{"temp1_input", "50000"}};
+    for (const auto& [attribute, expected] : states) {
+        EXPECT_EQ(
+            nodeOf({{"temp1_input", "50000"}, {attribute, "1"}}).values.possibleStates, expected)
+            << attribute;
+        all.emplace(attribute, "1");
+    }
+    EXPECT_THAT(*nodeOf(all).values.possibleStates, ElementsAre(1, 16, 21, 22, 23, 25, 26));
+}
 
 TEST_F(HwmonTest, LimitsThatNobodySetAreAbsent)
 {
