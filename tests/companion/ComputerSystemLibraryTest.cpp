@@ -9,23 +9,14 @@
 #include "host/broker/Result.h"
 #include "host/manager/ProviderLibrary.h"
 #include "tests/support/ExportedNames.h"
+#include "tests/support/ProcessState.h"
 
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
-#include <dlfcn.h>
-
 namespace ComputerSystemLibraryTests {
 
 const std::string library = SENSOR_PROFILE_BINARY_DIR "/lib/libComputerSystemProvider.so";
-
-bool isLoaded()
-{
-    void* const handle = ::dlopen(library.c_str(), RTLD_NOW | RTLD_NOLOAD);
-    if (handle != nullptr)
-        ::dlclose(handle);
-    return handle != nullptr;
-}
 
 TEST(ComputerSystemLibraryTest, ExportsItsFactoryAndNothingElse)
 {
@@ -47,9 +38,9 @@ TEST(ComputerSystemLibraryTest, IsUsedAndUnloadedOverAndOver)
                 request.makePath("root/cimv2", "ZUMLO_ComputerSystem").handle(), nullptr);
         EXPECT_EQ(status.rc, CMPI_RC_OK);
         EXPECT_EQ(answer.instances().size(), 1U);
-        EXPECT_TRUE(isLoaded());
+        EXPECT_TRUE(Testing::isMapped(library));
     }
-    EXPECT_FALSE(isLoaded());
+    EXPECT_FALSE(Testing::isMapped(library));
 }
 
 } // namespace ComputerSystemLibraryTests

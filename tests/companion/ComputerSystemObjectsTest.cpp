@@ -3,13 +3,10 @@
 #include "companion/ComputerSystemObjects.h"
 
 #include "platform/text/Trim.h"
+#include "tests/support/ExportedNames.h"
 #include "tests/support/ProviderTest.h"
 
 #include <gmock/gmock.h>
-
-#include <array>
-#include <cstdio>
-#include <memory>
 
 namespace ComputerSystemObjectsTests {
 
@@ -78,22 +75,13 @@ TEST_F(ComputerSystemObjectsTest, TheComputerHasTheSystemNameOfItsSensors)
     EXPECT_EQ(Vorn::Companion::thisComputerSystem().name, systemName_);
 }
 
-// Returns the first line that a command prints; empty when it prints none.
-std::string firstLineOf(const char* command)
-{
-    const std::unique_ptr<FILE, int (*)(FILE*)> pipe(::popen(command, "r"), ::pclose);
-    std::array<char, 128> line{};
-    if (pipe == nullptr || std::fgets(line.data(), line.size(), pipe.get()) == nullptr)
-        return {};
-    return std::string(Text::trimmed(line.data()));
-}
-
 TEST_F(ComputerSystemObjectsTest, TheMachineIdIsTheOneThatTheSystemDerivesForThisProvider)
 {
-    ASSERT_NE(firstLineOf("systemd-id128 new"), "") << "is the package systemd installed?";
+    ASSERT_NE(Testing::outputOf("systemd-id128 new"), "") << "is the package systemd installed?";
     EXPECT_EQ(Vorn::Companion::thisComputerSystem().machineId.value_or(""),
-        firstLineOf("systemd-id128 machine-id --uuid "
-                    "--app-specific=b3dfdcbb7a2845c0b6176da21f2a762d 2>/dev/null"));
+        Text::trimmed(
+            Testing::outputOf("systemd-id128 machine-id --uuid "
+                              "--app-specific=b3dfdcbb7a2845c0b6176da21f2a762d 2>/dev/null")));
 }
 
 } // namespace ComputerSystemObjectsTests

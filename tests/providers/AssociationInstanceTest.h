@@ -16,8 +16,8 @@ struct AssociationClass {
     const char* name;
     const char* one; // the first reference
     const char* other;
-    CMPIInstanceMI* (*createInstanceMI)(const CMPIBroker*, const CMPIContext*, CMPIStatus*);
-    CMPIAssociationMI* (*createAssociationMI)(const CMPIBroker*, const CMPIContext*, CMPIStatus*);
+    InstanceFactory createInstanceMI;
+    AssociationFactory createAssociationMI;
 };
 
 class AssociationInstanceTest : public AssociationTest {

@@ -15,8 +15,8 @@ using namespace Testing;
 struct Journey {
     const char* name;
     const char* association;
-    CMPIInstanceMI* (*instances)(const CMPIBroker*, const CMPIContext*, CMPIStatus*);
-    CMPIAssociationMI* (*associations)(const CMPIBroker*, const CMPIContext*, CMPIStatus*);
+    InstanceFactory instances;
+    AssociationFactory associations;
     const char* otherClass;
 };
 

@@ -65,9 +65,7 @@ inline const std::vector<ScriptedNode> ThreeSensors = {
 
 class AssociationTest : public ProviderTest {
 protected:
-    AssociationTest(
-        CMPIInstanceMI* (*instances)(const CMPIBroker*, const CMPIContext*, CMPIStatus*),
-        CMPIAssociationMI* (*associations)(const CMPIBroker*, const CMPIContext*, CMPIStatus*),
+    AssociationTest(InstanceFactory instances, AssociationFactory associations,
         std::vector<ScriptedNode> nodes, std::vector<std::string> systems)
         : machine_(std::move(nodes)), systems_(std::move(systems)),
           instanceMI_(instances(broker(), nullptr, nullptr)),

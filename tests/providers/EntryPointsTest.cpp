@@ -11,19 +11,13 @@
 
 namespace EntryPointsTests {
 
-using InstanceFactory = CMPIInstanceMI* (*)(const CMPIBroker*, const CMPIContext*, CMPIStatus*);
-using AssociationFactory = CMPIAssociationMI* (*)(const CMPIBroker*, const CMPIContext*,
-    CMPIStatus*);
-
-struct InstanceEntry {
+template <typename Factory>
+struct Entry {
     const char* miName;
-    InstanceFactory factory;
+    Factory factory;
 };
-
-struct AssociationEntry {
-    const char* miName;
-    AssociationFactory factory;
-};
+using InstanceEntry = Entry<Testing::InstanceFactory>;
+using AssociationEntry = Entry<Testing::AssociationFactory>;
 
 const InstanceEntry InstanceEntries[] = {
     {"instanceSensorProfileProvider", SensorProfileProvider_Create_InstanceMI},
@@ -42,8 +36,8 @@ const AssociationEntry AssociationEntries[] = {
 
 const CMPIBroker NoBroker = {};
 
-template <typename Entry>
-class EntryTest : public ::testing::TestWithParam<Entry> {
+template <typename EntryType>
+class EntryTest : public ::testing::TestWithParam<EntryType> {
 protected:
     auto* create(CMPIStatus* status = nullptr) const
     {
@@ -51,8 +45,8 @@ protected:
     }
 };
 
-template <typename Entry>
-std::string entryName(const ::testing::TestParamInfo<Entry>& info)
+template <typename EntryType>
+std::string entryName(const ::testing::TestParamInfo<EntryType>& info)
 {
     return info.param.miName;
 }
@@ -91,8 +85,8 @@ TEST_P(AssociationEntryTest, TheTableHasItsVersionsNameAndHandlers)
     EXPECT_NE(mi->ft->referenceNames, nullptr);
 }
 
-template <typename Entry>
-void expectTheSameRecordAtEveryCall(const Entry& entry)
+template <typename EntryType>
+void expectTheSameRecordAtEveryCall(const EntryType& entry)
 {
     const CMPIBroker other = {};
     auto* const first = entry.factory(&NoBroker, nullptr, nullptr);
@@ -110,8 +104,8 @@ TEST_P(AssociationEntryTest, EveryCallReturnsTheSameRecord)
     expectTheSameRecordAtEveryCall(GetParam());
 }
 
-template <typename Entry>
-void expectAnUntouchedStatus(const Entry& entry)
+template <typename EntryType>
+void expectAnUntouchedStatus(const EntryType& entry)
 {
     CMPIStatus status = {CMPI_RC_ERR_ACCESS_DENIED, nullptr};
     entry.factory(&NoBroker, nullptr, &status);
@@ -134,22 +128,24 @@ void expectStatus(const CMPIStatus& status, CMPIrc code)
     EXPECT_EQ(status.msg, nullptr);
 }
 
-TEST_P(InstanceEntryTest, CleanupIsOkWhetherTerminatingOrNotAndSilent)
+template <typename MI>
+void expectSilentCleanup(MI* mi)
 {
     const Testing::LogCapture capture;
-    CMPIInstanceMI* const mi = create();
     expectStatus(mi->ft->cleanup(mi, nullptr, 0), CMPI_RC_OK);
     expectStatus(mi->ft->cleanup(mi, nullptr, 1), CMPI_RC_OK);
     EXPECT_TRUE(capture.log().empty());
+    EXPECT_TRUE(capture.trace().empty());
+}
+
+TEST_P(InstanceEntryTest, CleanupIsOkWhetherTerminatingOrNotAndSilent)
+{
+    expectSilentCleanup(create());
 }
 
 TEST_P(AssociationEntryTest, CleanupIsOkWhetherTerminatingOrNotAndSilent)
 {
-    const Testing::LogCapture capture;
-    CMPIAssociationMI* const mi = create();
-    expectStatus(mi->ft->cleanup(mi, nullptr, 0), CMPI_RC_OK);
-    expectStatus(mi->ft->cleanup(mi, nullptr, 1), CMPI_RC_OK);
-    EXPECT_TRUE(capture.log().empty());
+    expectSilentCleanup(create());
 }
 
 TEST_P(InstanceEntryTest, WritingAndQueryingAreNotSupportedWhateverTheArgumentsAndSilent)

@@ -107,10 +107,6 @@ TEST_F(EnumerationFailureTest, EndsTheSearchForCapabilities)
 
 class FailingAssociationTest : public AssociationTest {
 protected:
-    using InstanceFactory = CMPIInstanceMI* (*)(const CMPIBroker*, const CMPIContext*, CMPIStatus*);
-    using AssociationFactory = CMPIAssociationMI* (*)(const CMPIBroker*, const CMPIContext*,
-        CMPIStatus*);
-
     FailingAssociationTest(InstanceFactory instances, AssociationFactory associations)
         : AssociationTest(instances, associations, {ThreeSensors[0]}, {"host"})
     {

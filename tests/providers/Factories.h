@@ -7,6 +7,12 @@
 #include <cmpidt.h>
 #include <cmpift.h>
 
+namespace Testing {
+using InstanceFactory = CMPIInstanceMI* (*)(const CMPIBroker*, const CMPIContext*, CMPIStatus*);
+using AssociationFactory = CMPIAssociationMI* (*)(const CMPIBroker*, const CMPIContext*,
+    CMPIStatus*);
+} // namespace Testing
+
 extern "C" {
 CMPIInstanceMI* SensorProfileProvider_Create_InstanceMI(
     const CMPIBroker*, const CMPIContext*, CMPIStatus*);

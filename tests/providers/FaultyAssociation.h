@@ -5,6 +5,7 @@
 #pragma once
 
 #include "tests/providers/ComputerSystems.h"
+#include "tests/providers/Factories.h"
 #include "tests/providers/FaultyRequest.h"
 #include "tests/providers/ProfileClasses.h"
 #include "tests/providers/RequestTrace.h"
@@ -55,8 +56,8 @@ inline SourceMaker sensorMaker(const std::string& deviceID)
 
 // The kinds of requests to the provider with these factories.
 struct RequestKinds {
-    CMPIInstanceMI* (*instanceFactory)(const CMPIBroker*, const CMPIContext*, CMPIStatus*);
-    CMPIAssociationMI* (*associationFactory)(const CMPIBroker*, const CMPIContext*, CMPIStatus*);
+    InstanceFactory instanceFactory;
+    AssociationFactory associationFactory;
 
     RequestKind names(const SourceMaker& ref) const
     {

@@ -23,7 +23,7 @@ struct ProviderCase {
     const char* provider;
     const char* key;
     const char* value; // of the key of the one instance
-    CMPIInstanceMI* (*create)(const CMPIBroker*, const CMPIContext*, CMPIStatus*);
+    InstanceFactory create;
 };
 
 const ProviderCase Cases[] = {

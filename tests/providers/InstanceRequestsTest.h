@@ -15,9 +15,8 @@ namespace Testing {
 
 class InstanceRequestsTest : public ProviderTest {
 protected:
-    InstanceRequestsTest(const char* className,
-        CMPIInstanceMI* (*create)(const CMPIBroker*, const CMPIContext*, CMPIStatus*),
-        std::vector<ScriptedNode> nodes)
+    InstanceRequestsTest(
+        const char* className, InstanceFactory create, std::vector<ScriptedNode> nodes)
         : className_(className), machine_(std::move(nodes)), mi_(create(broker(), nullptr, nullptr))
     {
     }

@@ -16,10 +16,6 @@ using namespace ::testing;
 using Vorn::NodeReading;
 using Vorn::NodeLexicon::NodeType;
 
-using InstanceFactory = CMPIInstanceMI* (*)(const CMPIBroker*, const CMPIContext*, CMPIStatus*);
-using AssociationFactory = CMPIAssociationMI* (*)(const CMPIBroker*, const CMPIContext*,
-    CMPIStatus*);
-
 struct Module {
     const char* name;
     InstanceFactory instances;
@@ -166,14 +162,6 @@ TEST_P(BothKindsTest, TheInstanceFactorysBrokerIsAlsoThatOfTheAssociations)
     CMPIInstanceMI* const instances = GetParam().instances(second_.handle(), nullptr, nullptr);
     expectRequestOf(associations, second_);
     expectRequestOf(instances, second_);
-}
-
-TEST_P(BothKindsTest, CleaningUpAssociationsWritesNoLine)
-{
-    CMPIAssociationMI* const associations = GetParam().associations(broker(), nullptr, nullptr);
-    const LogCapture capture;
-    associations->ft->cleanup(associations, context(), 1);
-    expectUntouched(capture);
 }
 
 } // namespace ProviderLifeTests

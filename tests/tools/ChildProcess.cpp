@@ -5,7 +5,6 @@
 #include <fcntl.h>
 #include <poll.h>
 #include <pty.h>
-#include <spawn.h>
 #include <sys/wait.h>
 #include <unistd.h>
 
@@ -84,7 +83,16 @@ std::vector<std::string> commandOf(
     return command;
 }
 
-std::vector<std::string> environmentWith(const std::map<std::string, std::string>& changes)
+std::vector<std::string> entriesOf(const std::map<std::string, std::string>& variables)
+{
+    std::vector<std::string> entries;
+    for (const auto& [name, value] : variables)
+        entries.push_back(name + "=" + value);
+    return entries;
+}
+
+std::map<std::string, std::string> environmentWith(
+    const std::map<std::string, std::string>& changes)
 {
     static const std::set<std::string> withheld = {
         "VORN_INSTRUMENTATION", "COLUMNS", "NO_COLOR", "TERM"};
@@ -100,11 +108,7 @@ std::vector<std::string> environmentWith(const std::map<std::string, std::string
     for (const auto& settings : {defaults, changes})
         for (const auto& [name, value] : settings)
             variables[name] = value;
-
-    std::vector<std::string> entries;
-    for (const auto& [name, value] : variables)
-        entries.push_back(name + "=" + value);
-    return entries;
+    return variables;
 }
 
 // What posix_spawn does to the child's descriptors.
@@ -115,7 +119,7 @@ public:
     Actions(const Actions&) = delete;
     Actions& operator=(const Actions&) = delete;
 
-    const posix_spawn_file_actions_t* get() const { return &actions_; }
+    const posix_spawn_file_actions_t& get() const { return actions_; }
     void duplicate(int from, int to)
     {
         check(::posix_spawn_file_actions_adddup2(&actions_, from, to));
@@ -190,10 +194,17 @@ void waitFor(pid_t child, Ended& ended)
 
 } // namespace
 
+int spawn(::pid_t& child, const std::string& program, const std::vector<std::string>& arguments,
+    const std::map<std::string, std::string>& variables, const posix_spawn_file_actions_t& actions)
+{
+    const Strings command(commandOf(program, arguments));
+    const Strings entries(entriesOf(variables));
+    return ::posix_spawn(
+        &child, program.c_str(), &actions, nullptr, command.pointers(), entries.pointers());
+}
+
 Ended run(const std::vector<std::string>& arguments, const RunOptions& options)
 {
-    const Strings command(commandOf(options.program, arguments));
-    const Strings environment(environmentWith(options.environment));
     Pipe out = makePipe();
     Pipe err = makePipe();
     Actions actions;
@@ -203,8 +214,8 @@ Ended run(const std::vector<std::string>& arguments, const RunOptions& options)
         out.read.close();
 
     pid_t child = 0;
-    check(::posix_spawn(&child, options.program.c_str(), actions.get(), nullptr, command.pointers(),
-        environment.pointers()));
+    check(spawn(
+        child, options.program, arguments, environmentWith(options.environment), actions.get()));
     out.write.close();
     err.write.close();
     Ended ended;
@@ -217,7 +228,7 @@ Ended runOnTerminal(const std::vector<std::string>& arguments, unsigned short co
     const std::map<std::string, std::string>& environment)
 {
     const Strings command(commandOf(sensorctl, arguments));
-    const Strings variables(environmentWith(environment));
+    const Strings variables(entriesOf(environmentWith(environment)));
     const winsize size = {24, columns, 0, 0};
     int terminal = -1;
     const pid_t child = ::forkpty(&terminal, nullptr, nullptr, &size);

@@ -4,6 +4,9 @@
 
 #pragma once
 
+#include <spawn.h>
+#include <sys/types.h>
+
 #include <map>
 #include <optional>
 #include <string>
@@ -37,6 +40,10 @@ struct RunOptions {
 };
 
 Ended run(const std::vector<std::string>& arguments, const RunOptions& options = {});
+
+// Starts a program with these variables and no others. Returns the number of the error, or 0.
+int spawn(::pid_t& child, const std::string& program, const std::vector<std::string>& arguments,
+    const std::map<std::string, std::string>& variables, const posix_spawn_file_actions_t& actions);
 
 // On a terminal of so many columns, which is where `out` comes from; standard error goes there too.
 Ended runOnTerminal(const std::vector<std::string>& arguments, unsigned short columns,

@@ -4,13 +4,12 @@
 
 #include "host/cimxml/Message.h"
 #include "tests/support/CimCall.h"
+#include "tests/support/ProcessState.h"
 
 #include <gtest/gtest.h>
 
 #include <malloc.h>
-#include <unistd.h>
 
-#include <fstream>
 #include <memory>
 #include <stdexcept>
 #include <string>
@@ -61,14 +60,6 @@ private:
     std::unique_ptr<Response> kept_;
 };
 
-std::size_t residentMegabytes()
-{
-    std::size_t whole = 0;
-    std::size_t resident = 0;
-    std::ifstream("/proc/self/statm") >> whole >> resident;
-    return resident * static_cast<std::size_t>(::sysconf(_SC_PAGESIZE)) >> 20U;
-}
-
 // What is resident more once an answer of so many objects was dropped.
 std::size_t leftBehindBy(
     std::size_t objects, const std::string& body = Testing::cimCall("EnumerateClassNames"))
@@ -77,13 +68,13 @@ std::size_t leftBehindBy(
     Tools::MemoryReturn memoryReturn(handler);
     const Host::CimXml::Message message(body);
     ::malloc_trim(0); // what was left behind before would be used again
-    const std::size_t before = residentMegabytes();
+    const std::size_t before = Testing::residentBytes() >> 20U;
     if (objects == 0) {
         EXPECT_THROW(memoryReturn.answer(message, {}), std::runtime_error);
     } else {
         EXPECT_EQ(memoryReturn.answer(message, {})->heldObjects(), objects);
     }
-    const std::size_t after = residentMegabytes();
+    const std::size_t after = Testing::residentBytes() >> 20U;
     return after > before ? after - before : 0;
 }
 

@@ -24,7 +24,7 @@ bool names(const std::vector<std::string>& arguments, const std::string& option)
     return std::find(arguments.begin(), arguments.end(), option) != arguments.end();
 }
 
-std::vector<std::string> completed(const std::string& program, std::vector<std::string> arguments)
+std::vector<std::string> completed(std::vector<std::string> arguments)
 {
     const bool isConfigured = names(arguments, "--config");
     if (!isConfigured && !names(arguments, "--port"))
@@ -33,25 +33,8 @@ std::vector<std::string> completed(const std::string& program, std::vector<std::
         arguments.insert(arguments.end(), {"--tls-port", "0"});
     if (::geteuid() == 0 && !isConfigured && !names(arguments, "--user"))
         arguments.insert(arguments.end(), {"--user", "root"});
-    arguments.insert(arguments.begin(), {program, "serve"});
+    arguments.insert(arguments.begin(), "serve");
     return arguments;
-}
-
-std::vector<std::string> entriesOf(const std::map<std::string, std::string>& environment)
-{
-    std::vector<std::string> entries;
-    for (const auto& [name, value] : environment)
-        entries.push_back(name + "=" + value);
-    return entries;
-}
-
-std::vector<char*> pointersTo(std::vector<std::string>& texts)
-{
-    std::vector<char*> pointers;
-    for (std::string& text : texts)
-        pointers.push_back(text.data());
-    pointers.push_back(nullptr);
-    return pointers;
 }
 
 } // namespace
@@ -59,18 +42,15 @@ std::vector<char*> pointersTo(std::vector<std::string>& texts)
 ServerProcess::ServerProcess(std::vector<std::string> arguments,
     const std::map<std::string, std::string>& environment, const std::string& program)
 {
-    std::vector<std::string> command = completed(program, std::move(arguments));
     std::map<std::string, std::string> variables{{"LC_ALL", "C"}, {"PATH", "/usr/bin:/bin"}};
     for (const auto& [name, value] : environment)
         variables[name] = value;
-    std::vector<std::string> entries = entriesOf(variables);
     posix_spawn_file_actions_t actions{};
     ::posix_spawn_file_actions_init(&actions);
     for (const auto& [descriptor, name] : {std::pair(STDOUT_FILENO, "out"), {STDERR_FILENO, "err"}})
         ::posix_spawn_file_actions_addopen(&actions, descriptor, (folder_.path() / name).c_str(),
             O_WRONLY | O_CREAT | O_APPEND, 0666);
-    const int error = ::posix_spawn(&process_, program.c_str(), &actions, nullptr,
-        pointersTo(command).data(), pointersTo(entries).data());
+    const int error = spawn(process_, program, completed(std::move(arguments)), variables, actions);
     ::posix_spawn_file_actions_destroy(&actions);
     if (error != 0)
         throw std::system_error(error, std::generic_category());

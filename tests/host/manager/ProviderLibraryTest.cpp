@@ -8,6 +8,7 @@
 #include "tests/host/manager/OddProvider.h"
 #include "tests/support/ClassTable.h"
 #include "tests/support/ErrorOf.h"
+#include "tests/support/ProcessState.h"
 #include "tests/support/TemporaryFolder.h"
 
 #include <gmock/gmock.h>
@@ -28,14 +29,6 @@ using testing::HasSubstr;
 
 const std::string oddProvider = SENSOR_PROFILE_BINARY_DIR "/lib/libOddProvider.so";
 const std::string sensorProvider = SENSOR_PROFILE_BINARY_DIR "/lib/libSensorProfileProvider.so";
-
-bool isLoaded(const std::string& file)
-{
-    void* const library = ::dlopen(file.c_str(), RTLD_NOW | RTLD_NOLOAD);
-    if (library != nullptr)
-        ::dlclose(library);
-    return library != nullptr;
-}
 
 // Keeps the odd library in memory and asks it what happened.
 class Witness {
@@ -63,12 +56,12 @@ protected:
 
 TEST_F(ProviderLibraryTest, IsInMemoryAsLongAsItsObjectLives)
 {
-    ASSERT_FALSE(isLoaded(oddProvider));
+    ASSERT_FALSE(Testing::isMapped(oddProvider));
     {
         const Host::ProviderLibrary library(broker_, oddProvider);
-        EXPECT_TRUE(isLoaded(oddProvider));
+        EXPECT_TRUE(Testing::isMapped(oddProvider));
     }
-    EXPECT_FALSE(isLoaded(oddProvider));
+    EXPECT_FALSE(Testing::isMapped(oddProvider));
 }
 
 TEST_F(ProviderLibraryTest, KeepsItsSymbolsToItself)
@@ -109,7 +102,7 @@ TEST_F(ProviderLibraryTest, StaysInMemoryWhenACleanupAsksForIt)
     library->createInstanceMI("Leaving");
     library->createInstanceMI("Staying");
     library.reset();
-    EXPECT_TRUE(isLoaded(copy));
+    EXPECT_TRUE(Testing::isMapped(copy));
 }
 
 TEST_F(ProviderLibraryTest, ReturnsTheSensorProvidersInterface)

@@ -10,12 +10,10 @@
 #include "host/broker/Result.h"
 #include "host/manager/ProviderLibrary.h"
 #include "tests/support/Environment.h"
+#include "tests/support/ProcessState.h"
 #include "tests/support/TemporaryFolder.h"
 
 #include <gtest/gtest.h>
-
-#include <dlfcn.h>
-#include <unistd.h>
 
 #include <algorithm>
 #include <filesystem>
@@ -57,34 +55,11 @@ void enumerate(std::size_t& count)
     count = answer.instances().size();
 }
 
-bool isLoaded()
-{
-    void* const library = ::dlopen(provider.c_str(), RTLD_NOW | RTLD_NOLOAD);
-    if (library != nullptr)
-        ::dlclose(library);
-    return library != nullptr;
-}
-
-// In bytes.
-std::size_t residentSize()
-{
-    std::size_t total = 0;
-    std::size_t resident = 0;
-    std::ifstream("/proc/self/statm") >> total >> resident;
-    return resident * static_cast<std::size_t>(::sysconf(_SC_PAGESIZE));
-}
-
 std::size_t lines(const char* file)
 {
     std::ifstream in(file);
     return static_cast<std::size_t>(
         std::count(std::istreambuf_iterator<char>(in), std::istreambuf_iterator<char>(), '\n'));
-}
-
-std::size_t openDescriptors()
-{
-    const std::filesystem::directory_iterator descriptors("/proc/self/fd");
-    return static_cast<std::size_t>(std::distance(begin(descriptors), end(descriptors)));
 }
 
 class UnloadTest : public testing::Test {
@@ -101,17 +76,17 @@ protected:
         const Testing::EnvironmentVariable trace("RYNLOG_TRACE", "file:" + path("trace"));
 
         use(warmUp, sensors);
-        const std::size_t sizeBefore = residentSize();
+        const std::size_t sizeBefore = Testing::residentBytes();
         const std::size_t mappingsBefore = lines("/proc/self/maps");
-        const std::size_t descriptorsBefore = openDescriptors();
+        const std::size_t descriptorsBefore = Testing::openDescriptors();
         use(uses - warmUp, sensors);
 
-        EXPECT_FALSE(isLoaded());
-        EXPECT_EQ(openDescriptors(), descriptorsBefore);
+        EXPECT_FALSE(Testing::isMapped(provider));
+        EXPECT_EQ(Testing::openDescriptors(), descriptorsBefore);
         EXPECT_GT(std::filesystem::file_size(path("trace")), 0U);
         if (isSanitized)
             return; // a sanitizer's own bookkeeping grows
-        EXPECT_LE(residentSize(), sizeBefore + tolerance);
+        EXPECT_LE(Testing::residentBytes(), sizeBefore + tolerance);
         EXPECT_LE(lines("/proc/self/maps"), mappingsBefore + 2);
     }
 
@@ -137,7 +112,7 @@ TEST_F(UnloadTest, ProviderLeavesMemoryAfterOneUse)
     std::size_t count = 0;
     ASSERT_NO_FATAL_FAILURE(enumerate(count));
     EXPECT_EQ(count, 3U);
-    EXPECT_FALSE(isLoaded());
+    EXPECT_FALSE(Testing::isMapped(provider));
 }
 
 TEST_F(UnloadTest, ThousandUsesOnAModelLeaveNothingBehind)

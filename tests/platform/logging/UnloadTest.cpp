@@ -1,7 +1,7 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
 #include "tests/platform/logging/LogFile.h"
-#include "tests/support/Mappings.h"
+#include "tests/support/ProcessState.h"
 
 #include <gtest/gtest.h>
 
@@ -13,12 +13,7 @@ namespace UnloadTests {
 
 using Testing::isMapped;
 using Testing::LogFile;
-
-std::size_t openDescriptors()
-{
-    const std::filesystem::directory_iterator descriptors("/proc/self/fd");
-    return static_cast<std::size_t>(std::distance(begin(descriptors), end(descriptors)));
-}
+using Testing::openDescriptors;
 
 void loadLogAndUnload(const std::string& path)
 {
