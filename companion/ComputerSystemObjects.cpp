@@ -4,24 +4,25 @@
 
 #include <cmpimacs.h>
 
+#include <array>
 #include <cstdint>
 
 namespace Vorn::Companion {
 
 namespace {
 
-constexpr const char* CreationClassNameKey = "CreationClassName";
-constexpr const char* NameKey = "Name";
+constexpr const char* creationClassNameKey = "CreationClassName";
+constexpr const char* nameKey = "Name";
 
 // Codes of the DMTF value maps.
-constexpr std::uint16_t Enabled = 2;        // CIM_EnabledLogicalElement.EnabledState
-constexpr std::uint16_t NotApplicable = 12; // .RequestedState: nobody can request one here
-constexpr std::uint16_t Healthy = 5;        // CIM_ManagedSystemElement.HealthState
-constexpr std::uint16_t Ok = 2;             // .OperationalStatus
-constexpr std::uint16_t NotDedicated = 0;   // CIM_ComputerSystem.Dedicated
+constexpr std::uint16_t enabled = 2;        // CIM_EnabledLogicalElement.EnabledState
+constexpr std::uint16_t notApplicable = 12; // .RequestedState: nobody can request one here
+constexpr std::uint16_t healthy = 5;        // CIM_ManagedSystemElement.HealthState
+constexpr std::uint16_t ok = 2;             // .OperationalStatus
+constexpr std::uint16_t notDedicated = 0;   // CIM_ComputerSystem.Dedicated
 
 // The kernel's host name is none of the kinds of names that the value map of NameFormat lists.
-constexpr const char* HostNameFormat = "Other";
+constexpr const char* hostNameFormat = "Other";
 
 const char* nameSpaceOf(const CMPIObjectPath* ref)
 {
@@ -77,7 +78,7 @@ void setTexts(
 void setIdentity(
     const CMPIBroker* broker, const CMPIInstance* instance, const ComputerSystem& system)
 {
-    setText(instance, "NameFormat", HostNameFormat);
+    setText(instance, "NameFormat", hostNameFormat);
     setText(instance, "ElementName", system.name.c_str());
     setText(instance, "Caption", "Computer System");
     setText(instance, "Description", "The computer that the sensors of this system belong to.");
@@ -90,11 +91,11 @@ void setIdentity(
 
 void setState(const CMPIBroker* broker, const CMPIInstance* instance)
 {
-    setCodes(broker, instance, "Dedicated", NotDedicated);
-    setCode(instance, "EnabledState", Enabled);
-    setCode(instance, "RequestedState", NotApplicable);
-    setCode(instance, "HealthState", Healthy);
-    setCodes(broker, instance, "OperationalStatus", Ok);
+    setCodes(broker, instance, "Dedicated", notDedicated);
+    setCode(instance, "EnabledState", enabled);
+    setCode(instance, "RequestedState", notApplicable);
+    setCode(instance, "HealthState", healthy);
+    setCodes(broker, instance, "OperationalStatus", ok);
 }
 
 } // namespace
@@ -109,8 +110,8 @@ CMPIObjectPath* makePath(
     if (!isUsable(path))
         return nullptr;
     CMSetHostname(path, system.name.c_str());
-    const bool isWhole = addKey(path, CreationClassNameKey, ComputerSystemClass) &&
-                         addKey(path, NameKey, system.name.c_str()) && isUsable(path);
+    const bool isWhole = addKey(path, creationClassNameKey, ComputerSystemClass) &&
+                         addKey(path, nameKey, system.name.c_str()) && isUsable(path);
     return isWhole ? path : nullptr;
 }
 
@@ -120,10 +121,10 @@ CMPIInstance* makeInstance(const CMPIBroker* broker, const CMPIObjectPath* path,
     CMPIInstance* const instance = CMNewInstance(broker, path, nullptr);
     if (!isUsable(instance))
         return nullptr;
-    const char* keys[] = {CreationClassNameKey, NameKey, nullptr};
-    CMSetPropertyFilter(instance, properties, keys);
-    if (!setText(instance, CreationClassNameKey, ComputerSystemClass) ||
-        !setText(instance, NameKey, system.name.c_str()))
+    std::array<const char*, 3> keys = {creationClassNameKey, nameKey, nullptr};
+    CMSetPropertyFilter(instance, properties, keys.data());
+    if (!setText(instance, creationClassNameKey, ComputerSystemClass) ||
+        !setText(instance, nameKey, system.name.c_str()))
         return nullptr;
     setIdentity(broker, instance, system);
     setState(broker, instance);

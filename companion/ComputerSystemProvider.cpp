@@ -17,8 +17,8 @@ namespace {
 // Some object managers call the factory again while requests run.
 std::atomic<const CMPIBroker*> theBroker = nullptr;
 
-constexpr CMPIStatus OkStatus = {CMPI_RC_OK, nullptr};
-constexpr CMPIStatus NotSupported = {CMPI_RC_ERR_NOT_SUPPORTED, nullptr};
+constexpr CMPIStatus okStatus = {CMPI_RC_OK, nullptr};
+constexpr CMPIStatus notSupported = {CMPI_RC_ERR_NOT_SUPPORTED, nullptr};
 
 // Returns the status with a message, or without one where the broker fails to make it.
 CMPIStatus failure(const CMPIBroker* broker, CMPIrc code, const char* message)
@@ -60,7 +60,7 @@ CMPIStatus returnInstance(const CMPIBroker* broker, const CMPIResult* result,
 
 CMPIStatus ComputerSystem_Cleanup(CMPIInstanceMI*, const CMPIContext*, CMPIBoolean)
 {
-    return OkStatus;
+    return okStatus;
 }
 
 CMPIStatus ComputerSystem_EnumInstanceNames(
@@ -94,25 +94,25 @@ CMPIStatus ComputerSystem_GetInstance(CMPIInstanceMI*, const CMPIContext*, const
 CMPIStatus ComputerSystem_CreateInstance(CMPIInstanceMI*, const CMPIContext*, const CMPIResult*,
     const CMPIObjectPath*, const CMPIInstance*)
 {
-    return NotSupported;
+    return notSupported;
 }
 
 CMPIStatus ComputerSystem_ModifyInstance(CMPIInstanceMI*, const CMPIContext*, const CMPIResult*,
     const CMPIObjectPath*, const CMPIInstance*, const char**)
 {
-    return NotSupported;
+    return notSupported;
 }
 
 CMPIStatus ComputerSystem_DeleteInstance(
     CMPIInstanceMI*, const CMPIContext*, const CMPIResult*, const CMPIObjectPath*)
 {
-    return NotSupported;
+    return notSupported;
 }
 
 CMPIStatus ComputerSystem_ExecQuery(CMPIInstanceMI*, const CMPIContext*, const CMPIResult*,
     const CMPIObjectPath*, const char*, const char*)
 {
-    return NotSupported;
+    return notSupported;
 }
 
 const CMPIInstanceMIFT handlers = {200, 200, "instanceComputerSystemProvider",

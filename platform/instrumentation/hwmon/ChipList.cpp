@@ -59,7 +59,7 @@ ChipList::Lock ChipList::lockPresent()
 void ChipList::renew()
 {
     // libsensors gives up when a chip goes away while it is looking; soon after, it will not.
-    constexpr int mostAttempts = 5;
+    constexpr int maximumAttempts = 5;
     for (int attempt = 1; true; ++attempt) {
         fingerprint_.clear();
         sensors_cleanup();
@@ -71,7 +71,7 @@ void ChipList::renew()
             fingerprint_ = present;
             return;
         } catch (const std::runtime_error&) {
-            if (attempt == mostAttempts)
+            if (attempt == maximumAttempts)
                 throw;
         }
     }

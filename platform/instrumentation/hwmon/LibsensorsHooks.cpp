@@ -12,13 +12,13 @@ namespace Vorn::Hwmon {
 namespace {
 
 // A configuration without end must not fill the memory or the log.
-constexpr std::size_t mostParseErrors = 20;
+constexpr std::size_t maximumParseErrors = 20;
 
 std::atomic<std::vector<LibsensorsHooks::ParseError>*> collected{nullptr};
 
 void collectParseError(const char* error, const char*, int line)
 {
-    if (auto* list = collected.load(); list != nullptr && list->size() < mostParseErrors)
+    if (auto* list = collected.load(); list != nullptr && list->size() < maximumParseErrors)
         list->push_back({error, line});
 }
 

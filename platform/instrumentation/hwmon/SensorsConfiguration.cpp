@@ -16,7 +16,7 @@ namespace {
 
 constexpr const char* safeStart = "chip \"none-isa-ffff\"\n";
 
-constexpr std::size_t mostBytes = std::size_t{1} << 20U;
+constexpr std::size_t maximumBytes = std::size_t{1} << 20U;
 
 int lineCount(const std::string& text)
 {
@@ -68,7 +68,7 @@ void SensorsConfiguration::append(const fs::path& file)
 {
     parts_.push_back({file.string(), lineCount(text_) + 1});
     try {
-        text_ += readRegularFile(file, mostBytes).text;
+        text_ += readRegularFile(file, maximumBytes).text;
     } catch (const std::runtime_error& error) {
         throw std::runtime_error("sensors configuration " + file.string() + ": " + error.what());
     }
