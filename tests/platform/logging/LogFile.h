@@ -26,15 +26,12 @@ private:
 };
 
 // Closes both channels again, so that no test sees the lines of another.
-class ScopedConfiguration {
+class ScopedLogSettings {
 public:
-    explicit ScopedConfiguration(const RynLog::LogSettings& configuration)
-    {
-        RynLog::configure(configuration);
-    }
-    ~ScopedConfiguration() { RynLog::configure({6000, "off", "off"}); }
-    ScopedConfiguration(const ScopedConfiguration&) = delete;
-    ScopedConfiguration& operator=(const ScopedConfiguration&) = delete;
+    explicit ScopedLogSettings(const RynLog::LogSettings& settings) { RynLog::configure(settings); }
+    ~ScopedLogSettings() { RynLog::configure({6000, "off", "off"}); }
+    ScopedLogSettings(const ScopedLogSettings&) = delete;
+    ScopedLogSettings& operator=(const ScopedLogSettings&) = delete;
 };
 
 inline void logLine(const std::string& text, int level = 6000)

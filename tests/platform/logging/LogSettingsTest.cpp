@@ -74,7 +74,7 @@ TEST(LogSettingsTest, ABadSinkIsNamedAndItsDefaultTaken)
 TEST(LogSettingsTest, AProblemIsTheFirstLineOfTheLogChannel)
 {
     const Testing::LogFile file;
-    const Testing::ScopedConfiguration configuration(
+    const Testing::ScopedLogSettings settings(
         {6000, file.sink(), file.sink(), "RYNLOG_LEVEL=high makes no sense"});
     Testing::logLine("second");
     ASSERT_THAT(file.lines(), SizeIs(2));
@@ -86,7 +86,7 @@ TEST(LogSettingsTest, AProblemIsTheFirstLineOfTheLogChannel)
 TEST(LogSettingsTest, ASinkThatMakesNoSenseChangesNothing)
 {
     const Testing::LogFile file;
-    const Testing::ScopedConfiguration configuration({6000, file.sink(), "off"});
+    const Testing::ScopedLogSettings settings({6000, file.sink(), "off"});
     EXPECT_THROW(RynLog::configure({6000, "nowhere", "off"}), std::invalid_argument);
     EXPECT_THROW(RynLog::configure({6000, "off", "nowhere"}), std::invalid_argument);
     Testing::logLine("still here");

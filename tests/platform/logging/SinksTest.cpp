@@ -23,7 +23,7 @@ using testing::HasSubstr;
 using testing::IsEmpty;
 using Testing::LogFile;
 using Testing::logLine;
-using Testing::ScopedConfiguration;
+using Testing::ScopedLogSettings;
 using testing::SizeIs;
 using Testing::traceLine;
 
@@ -40,7 +40,7 @@ std::string utcSecond()
 TEST(FileSinkTest, WritesTheDocumentedLine)
 {
     const LogFile file;
-    const ScopedConfiguration configuration({6000, file.sink(), "off"});
+    const ScopedLogSettings settings({6000, file.sink(), "off"});
     logLine("some text");
     ASSERT_THAT(file.lines(), SizeIs(1));
     const std::regex format(R"(\d{4}-\d\d-\d\dT\d\d:\d\d:\d\d\.\d{6}Z )"
@@ -51,7 +51,7 @@ TEST(FileSinkTest, WritesTheDocumentedLine)
 TEST(FileSinkTest, TimeIsUtcWhateverTheZone)
 {
     const LogFile file;
-    const ScopedConfiguration configuration({6000, file.sink(), "off"});
+    const ScopedLogSettings settings({6000, file.sink(), "off"});
     const std::string before = utcSecond();
     logLine("now");
     const std::string after = utcSecond();
@@ -63,7 +63,7 @@ TEST(FileSinkTest, TimeIsUtcWhateverTheZone)
 TEST(FileSinkTest, TheTwoChannelsLeadWhereTheyAreToldTo)
 {
     const LogFile log, trace;
-    const ScopedConfiguration configuration({6000, log.sink(), trace.sink()});
+    const ScopedLogSettings settings({6000, log.sink(), trace.sink()});
     logLine("to the log");
     traceLine("to the trace");
     EXPECT_THAT(log.lines(), ElementsAre(HasSubstr("Z log 6000 ")));
@@ -73,7 +73,7 @@ TEST(FileSinkTest, TheTwoChannelsLeadWhereTheyAreToldTo)
 TEST(FileSinkTest, BothChannelsMayShareAFile)
 {
     const LogFile file;
-    const ScopedConfiguration configuration({6000, file.sink(), file.sink()});
+    const ScopedLogSettings settings({6000, file.sink(), file.sink()});
     logLine("first");
     traceLine("second");
     logLine("third");
@@ -85,7 +85,7 @@ TEST(FileSinkTest, AppendsToWhatIsThere)
 {
     const LogFile file;
     std::ofstream(file.path()) << "old line\n";
-    const ScopedConfiguration configuration({6000, file.sink(), "off"});
+    const ScopedLogSettings settings({6000, file.sink(), "off"});
     logLine("new line");
     EXPECT_THAT(file.lines(), ElementsAre("old line", EndsWith("new line")));
 }
@@ -93,7 +93,7 @@ TEST(FileSinkTest, AppendsToWhatIsThere)
 TEST(FileSinkTest, ALineIsOnDiskWhenTheCallReturns)
 {
     const LogFile file;
-    const ScopedConfiguration configuration({6000, file.sink(), "off"});
+    const ScopedLogSettings settings({6000, file.sink(), "off"});
     logLine("one");
     EXPECT_THAT(file.lines(), SizeIs(1));
     logLine("two");
@@ -103,7 +103,7 @@ TEST(FileSinkTest, ALineIsOnDiskWhenTheCallReturns)
 TEST(FileSinkTest, ATextCannotForgeALine)
 {
     const LogFile file;
-    const ScopedConfiguration configuration({6000, file.sink(), "off"});
+    const ScopedLogSettings settings({6000, file.sink(), "off"});
     EXPECT_EQ(RynLogger::logProblem(), "");
     logLine("name\n2026-11-21T01:02:03.000004Z log 6000 forged f(F:1) text");
     ASSERT_THAT(file.lines(), SizeIs(1));
@@ -113,7 +113,7 @@ TEST(FileSinkTest, ATextCannotForgeALine)
 TEST(FileSinkTest, TextIsNotTakenAsAFormat)
 {
     const LogFile file;
-    const ScopedConfiguration configuration({6000, file.sink(), "off"});
+    const ScopedLogSettings settings({6000, file.sink(), "off"});
     logLine("{} {0} %s %n %v");
     EXPECT_THAT(file.lines(), ElementsAre(EndsWith(" {} {0} %s %n %v")));
 }
@@ -121,7 +121,7 @@ TEST(FileSinkTest, TextIsNotTakenAsAFormat)
 TEST(FileSinkTest, LongLinesStayWhole)
 {
     const LogFile file;
-    const ScopedConfiguration configuration({6000, file.sink(), "off"});
+    const ScopedLogSettings settings({6000, file.sink(), "off"});
     const std::string text(1'000'000, 'x');
     logLine(text);
     EXPECT_THAT(file.lines(), ElementsAre(EndsWith(" " + text)));
@@ -130,7 +130,7 @@ TEST(FileSinkTest, LongLinesStayWhole)
 TEST(FileSinkTest, NullTextsAreWrittenAsNull)
 {
     const LogFile file;
-    const ScopedConfiguration configuration({6000, file.sink(), "off"});
+    const ScopedLogSettings settings({6000, file.sink(), "off"});
     RynLogger::logLevelMessage(nullptr, nullptr, 1, "", 6000, nullptr, 0, 0, "");
     EXPECT_THAT(file.lines(), ElementsAre(EndsWith(" log 6000  (null)((null):1) ")));
 }
@@ -140,7 +140,7 @@ TEST(FileSinkTest, APipeThatNobodyReadsIsNotWaitedFor)
     const Testing::TemporaryFolder folder;
     const std::string pipe = (folder.path() / "pipe").string();
     ASSERT_EQ(::mkfifo(pipe.c_str(), 0600), 0);
-    const ScopedConfiguration configuration({6000, "file:" + pipe, "off"});
+    const ScopedLogSettings settings({6000, "file:" + pipe, "off"});
     logLine("lost");
     EXPECT_FALSE(RynLogger::isWanted(6000));
 }
@@ -149,7 +149,7 @@ TEST(StandardErrorSinkTest, WritesTheDocumentedLine)
 {
     testing::internal::CaptureStderr();
     {
-        const ScopedConfiguration configuration({6000, "stderr", "stderr"});
+        const ScopedLogSettings settings({6000, "stderr", "stderr"});
         logLine("one");
         traceLine("two");
     }
@@ -167,7 +167,7 @@ TEST(StandardErrorSinkTest, ABrokenPipeDoesNotEndTheProcess)
     const int standardError = ::dup(STDERR_FILENO);
     ASSERT_GE(::dup2(ends[1], STDERR_FILENO), 0);
     {
-        const ScopedConfiguration configuration({6000, "stderr", "off"});
+        const ScopedLogSettings settings({6000, "stderr", "off"});
         logLine("lost"); // SIGPIPE has its default action here: the end
     }
     ::dup2(standardError, STDERR_FILENO);
@@ -182,7 +182,7 @@ TEST(OffSinkTest, NothingIsWantedAndNothingPrinted)
 {
     testing::internal::CaptureStderr();
     testing::internal::CaptureStdout();
-    const ScopedConfiguration configuration({0, "off", "off"});
+    const ScopedLogSettings settings({0, "off", "off"});
     logLine("lost");
     traceLine("lost");
     EXPECT_FALSE(RynLogger::isWanted(6000));
@@ -194,7 +194,7 @@ TEST(OffSinkTest, NothingIsWantedAndNothingPrinted)
 TEST(OffSinkTest, OneOpenChannelIsEnoughToWantALine)
 {
     const LogFile file;
-    const ScopedConfiguration configuration({3000, "off", file.sink()});
+    const ScopedLogSettings settings({3000, "off", file.sink()});
     EXPECT_TRUE(RynLogger::isWanted(3000));
     logLine("lost");
     traceLine("kept");
@@ -204,7 +204,7 @@ TEST(OffSinkTest, OneOpenChannelIsEnoughToWantALine)
 TEST(LevelTest, LinesFromTheLevelUpAreWritten)
 {
     const LogFile file;
-    const ScopedConfiguration configuration({4000, file.sink(), file.sink()});
+    const ScopedLogSettings settings({4000, file.sink(), file.sink()});
     EXPECT_FALSE(RynLogger::isWanted(3999));
     EXPECT_TRUE(RynLogger::isWanted(4000));
     EXPECT_TRUE(RynLogger::isWanted(4001));
@@ -219,7 +219,7 @@ TEST(LevelTest, LinesFromTheLevelUpAreWritten)
 TEST(LevelTest, AnyLevelIsPossible)
 {
     const LogFile file;
-    const ScopedConfiguration configuration({std::numeric_limits<int>::min(), file.sink(), "off"});
+    const ScopedLogSettings settings({std::numeric_limits<int>::min(), file.sink(), "off"});
     logLine("lowest", std::numeric_limits<int>::min());
     EXPECT_THAT(file.lines(), SizeIs(1));
 }

@@ -11,7 +11,7 @@ namespace SyslogTests {
 using testing::AllOf;
 using testing::HasSubstr;
 using Testing::logLine;
-using Testing::ScopedConfiguration;
+using Testing::ScopedLogSettings;
 using Testing::takeSyslogLines;
 
 // RFC 5424: facility 3 (daemon) times 8, severity 4 (warning) and 7 (debug).
@@ -25,7 +25,7 @@ protected:
 
 TEST_F(SyslogSinkTest, WritesTheLineWithoutATime)
 {
-    const ScopedConfiguration configuration({3000, "syslog", "off"});
+    const ScopedLogSettings settings({3000, "syslog", "off"});
     logLine("some text", 6000);
     const auto lines = takeSyslogLines();
     ASSERT_EQ(lines.size(), 1U);
@@ -34,7 +34,7 @@ TEST_F(SyslogSinkTest, WritesTheLineWithoutATime)
 
 TEST_F(SyslogSinkTest, MessagesAreWarningsAndMarksAreDebug)
 {
-    const ScopedConfiguration configuration({3000, "syslog", "off"});
+    const ScopedLogSettings settings({3000, "syslog", "off"});
     for (const int level : {3000, 5999, 6000, 7000})
         logLine("text", level);
     const auto lines = takeSyslogLines();
@@ -47,7 +47,7 @@ TEST_F(SyslogSinkTest, MessagesAreWarningsAndMarksAreDebug)
 
 TEST_F(SyslogSinkTest, TextIsNotTakenAsAFormatAndIsEscaped)
 {
-    const ScopedConfiguration configuration({6000, "syslog", "off"});
+    const ScopedLogSettings settings({6000, "syslog", "off"});
     logLine("%s%n\nforged");
     const auto lines = takeSyslogLines();
     ASSERT_EQ(lines.size(), 1U);
@@ -58,7 +58,7 @@ TEST_F(SyslogSinkTest, TheProcessKeepsItsOwnSyslogSettings)
 {
     const int before = Testing::syslogSettingsChanged();
     {
-        const ScopedConfiguration configuration({6000, "syslog", "syslog"});
+        const ScopedLogSettings settings({6000, "syslog", "syslog"});
         logLine("text");
     }
     EXPECT_EQ(Testing::syslogSettingsChanged(), before);
@@ -67,7 +67,7 @@ TEST_F(SyslogSinkTest, TheProcessKeepsItsOwnSyslogSettings)
 TEST_F(SyslogSinkTest, AFileThatCannotBeOpenedIsReportedOnceAndItsLinesAreLost)
 {
     testing::internal::CaptureStderr();
-    const ScopedConfiguration configuration({6000, "file:/nowhere\n/at all", "off"});
+    const ScopedLogSettings settings({6000, "file:/nowhere\n/at all", "off"});
     logLine("lost");
     logLine("lost");
     EXPECT_EQ(testing::internal::GetCapturedStderr(), "");
@@ -84,7 +84,7 @@ TEST_F(SyslogSinkTest, AFileThatCannotBeOpenedIsReportedOnceAndItsLinesAreLost)
 TEST_F(SyslogSinkTest, AFileThatTakesNoLinesIsReportedOnce)
 {
     testing::internal::CaptureStderr();
-    const ScopedConfiguration configuration({6000, "file:/dev/full", "off"});
+    const ScopedLogSettings settings({6000, "file:/dev/full", "off"});
     EXPECT_EQ(RynLog::RynLogger::logProblem(), "");
     logLine("lost");
     logLine("lost");
@@ -99,15 +99,14 @@ TEST_F(SyslogSinkTest, AFileThatTakesNoLinesIsReportedOnce)
 
 TEST_F(SyslogSinkTest, AProblemWithTheSettingsDoesNotFailOnAFullDisk)
 {
-    EXPECT_NO_THROW(
-        const ScopedConfiguration configuration({6000, "file:/dev/full", "off", "a problem"}));
+    EXPECT_NO_THROW(const ScopedLogSettings settings({6000, "file:/dev/full", "off", "a problem"}));
     EXPECT_EQ(takeSyslogLines().size(), 1U);
 }
 
 TEST_F(SyslogSinkTest, TheOtherChannelGoesOnWhenAFileCannotBeOpened)
 {
     const Testing::LogFile file;
-    const ScopedConfiguration configuration({6000, "file:/nowhere/at/all", file.sink()});
+    const ScopedLogSettings settings({6000, "file:/nowhere/at/all", file.sink()});
     logLine("lost");
     Testing::traceLine("kept");
     EXPECT_EQ(file.lines().size(), 1U);

@@ -12,7 +12,7 @@ namespace ThreadsTests {
 
 using Testing::LogFile;
 using Testing::logLine;
-using Testing::ScopedConfiguration;
+using Testing::ScopedLogSettings;
 using Testing::traceLine;
 
 constexpr int writers = 4;
@@ -26,7 +26,7 @@ std::string textOf(int writer, int number)
 TEST(ThreadsTest, WriteWholeLinesAndLoseNone)
 {
     const LogFile file;
-    const ScopedConfiguration configuration({6000, file.sink(), file.sink()});
+    const ScopedLogSettings settings({6000, file.sink(), file.sink()});
     {
         std::vector<std::jthread> threads;
         for (int writer = 0; writer < writers; ++writer)
@@ -49,7 +49,7 @@ TEST(ThreadsTest, WriteWholeLinesAndLoseNone)
 TEST(ThreadsTest, WriteOnWhileTheConfigurationChanges)
 {
     const LogFile first, second;
-    const ScopedConfiguration configuration({6000, first.sink(), "off"});
+    const ScopedLogSettings settings({6000, first.sink(), "off"});
     {
         std::vector<std::jthread> threads;
         for (int writer = 0; writer < writers; ++writer)
