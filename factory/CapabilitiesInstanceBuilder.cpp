@@ -11,6 +11,8 @@
 
 #include <cmpimacs.h>
 
+#include <array>
+
 namespace Vorn::SensorProfileProvider {
 
 namespace {
@@ -26,8 +28,8 @@ CMPIInstance* newCapabilitiesInstance(
         return nullptr;
     CMPIInstance* const instance = CMNewInstance(broker, path, nullptr);
     if (isUsable(instance)) {
-        const char* keys[] = {"InstanceID", nullptr};
-        CMSetPropertyFilter(instance, properties, keys);
+        std::array<const char*, 2> keys = {"InstanceID", nullptr};
+        CMSetPropertyFilter(instance, properties, keys.data());
     }
     return instance;
 }

@@ -15,6 +15,7 @@
 
 #include <cmpimacs.h>
 
+#include <array>
 #include <optional>
 
 namespace Vorn::SensorProfileProvider {
@@ -48,9 +49,9 @@ CMPIInstance* newSensorInstance(const CMPIBroker* broker, const CMPIObjectPath* 
     CMPIInstance* const instance = CMNewInstance(broker, path, nullptr);
     if (!isUsable(instance))
         return instance;
-    const char* keys[] = {
+    std::array<const char*, 5> keys = {
         "CreationClassName", "DeviceID", "SystemCreationClassName", "SystemName", nullptr};
-    CMSetPropertyFilter(instance, properties, keys);
+    CMSetPropertyFilter(instance, properties, keys.data());
     const InstanceWriter writer(broker, instance);
     writer.setText("CreationClassName", SensorClass);
     writer.setText("DeviceID", sensor.getDeviceID());
