@@ -1,7 +1,7 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// A list that grows in an arena: elements stay where they are and no memory is left behind
-// by growing.
+// A list in an arena. It grows by chunks: an arena cannot free the memory that a growing array
+// would leave behind.
 
 #pragma once
 
@@ -9,7 +9,6 @@
 
 #include <array>
 #include <cstddef>
-#include <iterator>
 
 namespace Host {
 
@@ -22,46 +21,29 @@ class ArenaList {
     };
 
 public:
-    // Stays good when elements are appended, also at the end that it has reached: it keeps where
-    // the list says which chunk it is in, and looks there when it is read. The list must stay
-    // where it is.
     class Iterator {
     public:
-        using iterator_category = std::forward_iterator_tag;
-        using value_type = Element;
-        using difference_type = std::ptrdiff_t;
-        using pointer = const Element*;
-        using reference = const Element&;
-
-        Iterator() noexcept = default;
-        reference operator*() const noexcept { return (*chunk_)->elements[index_ % chunkSize]; }
-        pointer operator->() const noexcept { return &**this; }
+        const Element& operator*() const noexcept { return chunk_->elements[index_ % chunkSize]; }
         Iterator& operator++() noexcept
         {
             if (++index_ % chunkSize == 0)
-                chunk_ = &(*chunk_)->next;
+                chunk_ = chunk_->next;
             return *this;
-        }
-        Iterator operator++(int) noexcept
-        {
-            const Iterator before = *this;
-            ++*this;
-            return before;
         }
         bool operator==(const Iterator& other) const noexcept { return index_ == other.index_; }
 
     private:
         friend class ArenaList;
-        Iterator(Chunk* const* chunk, std::size_t index) noexcept : chunk_(chunk), index_(index) {}
-        Chunk* const* chunk_ = nullptr;
-        std::size_t index_ = 0;
+        Iterator(const Chunk* chunk, std::size_t index) noexcept : chunk_(chunk), index_(index) {}
+        const Chunk* chunk_;
+        std::size_t index_;
     };
 
     std::size_t size() const noexcept { return size_; }
-    Iterator begin() const noexcept { return {&first_, 0}; }
+    Iterator begin() const noexcept { return {first_, 0}; }
     Iterator end() const noexcept { return {nullptr, size_}; }
 
-    // Null when the position is out of range.
+    // Returns null when the position is out of range.
     const Element* at(std::size_t position) const noexcept
     {
         if (position >= size_)
@@ -75,7 +57,7 @@ public:
     void append(Arena& arena, const Element& element)
     {
         if (size_ % chunkSize == 0) {
-            Chunk& chunk = arena.make<Chunk>();
+            auto& chunk = arena.make<Chunk>();
             (first_ == nullptr ? first_ : last_->next) = &chunk;
             last_ = &chunk;
         }

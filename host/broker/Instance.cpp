@@ -29,7 +29,7 @@ NameList copied(Arena& arena, const char** names)
     std::size_t count = 0;
     while (names != nullptr && names[count] != nullptr)
         ++count;
-    const String** const copy = arena.makeArray<const String*>(count);
+    auto* const copy = arena.makeArray<const String*>(count);
     std::transform(
         names, names + count, copy, [&arena](const char* name) { return &arena.name(name); });
     return {copy, count};
@@ -76,16 +76,18 @@ ObjectPath& Instance::objectPath() const
                 addKeyIfSet(path, *name->text(), key->value);
         return path;
     }
-    // In the order in which they were set, for providers keep the one of their paths. Most set
-    // the keys before all else.
+    // The keys keep the order in which they were set, which is that of the provider's paths. Most
+    // providers set them before all other properties, so that the search ends early.
     std::size_t missing = known->size();
-    for (auto property = properties_.begin(); missing != 0 && property != properties_.end();
-         ++property)
+    for (const NamedValue& property : properties_) {
+        if (missing == 0)
+            break;
         for (const std::string& key : *known)
-            if (equalNames(key, *property->name->text())) {
-                addKeyIfSet(path, key, property->value);
+            if (equalNames(key, *property.name->text())) {
+                addKeyIfSet(path, key, property.value);
                 --missing;
             }
+    }
     return path;
 }
 

@@ -6,7 +6,6 @@
 #include "host/broker/ObjectPath.h"
 #include "host/broker/String.h"
 
-#include <algorithm>
 #include <utility>
 
 namespace Host {
@@ -33,14 +32,15 @@ CMPIStatus deliver(const Instance& object, const CMPIResult* result, const char*
     return result->ft->returnInstance(result, copy);
 }
 
-// All keys of these classes are texts.
+// Returns whether the object has the keys of the target. All keys of these classes are texts.
 bool isAt(const Instance& object, const ObjectPath& target)
 {
-    const NamedValues& keys = object.objectPath().keys();
-    return std::all_of(keys.begin(), keys.end(), [&](const NamedValue& key) {
-        const Value* const wanted = target.key(*key.name->text());
-        return wanted != nullptr && wanted->text() == key.value.text();
-    });
+    for (const NamedValue& key : object.objectPath().keys()) {
+        const Value* const expected = target.key(*key.name->text());
+        if (expected == nullptr || expected->text() != key.value.text())
+            return false;
+    }
+    return true;
 }
 
 const CMPIInstanceMIFT functions = {
