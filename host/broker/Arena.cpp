@@ -6,6 +6,7 @@
 #include "host/broker/String.h"
 
 #include <cstring>
+#include <utility>
 
 namespace Host {
 

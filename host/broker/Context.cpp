@@ -10,9 +10,7 @@ const CMPIContextFT Context::functions = {
     .ftVersion = CMPIVersion200,
     .release = notOffered,
     .clone = notOffered,
-    .getEntry = slot<+[](const Context& context, const char* name) {
-        return context.entries_.get(name, CMPI_RC_ERR_NO_SUCH_PROPERTY);
-    }>,
+    .getEntry = notOffered,
     .getEntryAt = notOffered,
     .getEntryCount = notOffered,
     .addEntry = notOffered,

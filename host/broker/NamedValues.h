@@ -1,7 +1,7 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
 // Values found by name, in the order in which they were first set: the keys of a path, the
-// properties of an instance, the entries of a context.
+// properties of an instance.
 
 #pragma once
 

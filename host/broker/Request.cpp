@@ -8,30 +8,11 @@
 
 namespace Host {
 
-namespace {
-
-void addText(Context& context, Arena& arena, const char* name, std::string_view text)
-{
-    if (!text.empty())
-        context.add(name, Value::text(arena, text));
-}
-
-} // namespace
-
-Request::Request(const Broker& broker, const RequestInfo& info)
+Request::Request(const Broker& broker)
     : broker_(broker), own_(Arena::current() == nullptr ? std::make_shared<Arena>() : nullptr),
       arena_(own_ ? *own_ : *Arena::current())
 {
-    Arena* const before = Arena::makeCurrent(&arena_);
-    try {
-        context_.add(CMPIInvocationFlags, Value::integer(CMPI_uint32, info.flags));
-        addText(context_, arena_, CMPIInitNameSpace, info.nameSpace);
-        addText(context_, arena_, CMPIPrincipal, info.principal);
-        addText(context_, arena_, CMPIAcceptLanguage, info.acceptLanguage);
-    } catch (...) {
-        Arena::makeCurrent(before);
-        throw;
-    }
+    Arena::makeCurrent(&arena_);
 }
 
 Request::~Request()

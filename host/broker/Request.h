@@ -7,8 +7,6 @@
 #include "host/broker/Arena.h"
 #include "host/broker/Context.h"
 
-#include <cmpidt.h>
-
 #include <memory>
 #include <string_view>
 
@@ -18,14 +16,6 @@ class Broker;
 class Instance;
 class ObjectPath;
 
-// What the context of a request says; empty texts leave their entry out.
-struct RequestInfo {
-    CMPIFlags flags = 0; // CMPI_FLAG_LocalOnly and so on
-    std::string_view nameSpace{};
-    std::string_view principal{};
-    std::string_view acceptLanguage{};
-};
-
 // All objects made while it lasts go with it, unless somebody holds on to its arena. A request
 // made while another one is active on the thread, as in an up-call, uses the arena of that one:
 // its objects can be handed to the caller and go with the outermost request.
@@ -34,7 +24,7 @@ struct RequestInfo {
 class Request {
 public:
     // The broker must outlive the request.
-    explicit Request(const Broker& broker, const RequestInfo& info = {});
+    explicit Request(const Broker& broker);
     ~Request();
     Request(const Request&) = delete;
     Request& operator=(const Request&) = delete;

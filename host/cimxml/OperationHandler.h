@@ -16,7 +16,6 @@ class Message;
 struct Caller {
     std::string principal; // the authenticated user; empty without authentication
     std::string address;   // for the log
-    std::string acceptLanguage;
 };
 
 // The response to one message. Used by one thread at a time, which need not be the one that made

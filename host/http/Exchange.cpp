@@ -52,7 +52,6 @@ bool Exchange::begin(const RequestHead& head, std::size_t headSize)
                 "a head holds at most " + std::to_string(service_.limits.maximumHeader) + " bytes");
         head_ = checkHead(head, bodySize_, service_.limits);
         caller_.address = client_.address;
-        caller_.acceptLanguage = head_.acceptLanguage;
         if (service_.signIns.areDemanded())
             signIn(head);
     } catch (const HttpError& error) {

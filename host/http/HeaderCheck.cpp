@@ -224,7 +224,6 @@ CallHead checkHead(const RequestHead& head, const BodySize& body, const Limits& 
     checkOperation(head, prefix);
     call.method = findDecoded(head, prefix + "CIMMethod");
     call.object = findDecoded(head, prefix + "CIMObject");
-    call.acceptLanguage = head.find("Accept-Language").value_or("");
     return call;
 }
 

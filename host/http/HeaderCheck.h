@@ -22,7 +22,6 @@ struct CallHead {
     std::optional<std::string> extension; // the prefix of an M-POST's field names, such as 73
     std::optional<std::string> method;    // CIMMethod, decoded
     std::optional<std::string> object;    // CIMObject, decoded
-    std::string acceptLanguage;
 };
 
 struct BodySize {

@@ -51,16 +51,10 @@ std::unique_ptr<CimXml::Response> Dispatcher::answer(
 std::unique_ptr<CimXml::Response> Dispatcher::carryOut(
     const CimXml::Message& message, const CimXml::Caller& caller)
 {
-    // What is read lives in the same memory as what is found, but the context can be made only
-    // when the operation is known.
-    const Request reading(manager_.broker());
+    Request request(manager_.broker());
     Operation operation = readOperation(message, classes_);
     operation.selection = effectiveSelection(operation, classes_);
-    Request request(manager_.broker(), {.flags = flagsOf(operation),
-                                           .nameSpace = operation.nameSpace,
-                                           .principal = caller.principal,
-                                           .acceptLanguage = caller.acceptLanguage});
-    FoundObjects found(reading.shareArena());
+    FoundObjects found(request.shareArena());
     const auto continuation = run(operation, request, caller.principal, found);
     return std::make_unique<ObjectResponse>(message, operation.kind, classes_,
         CimXml::Location{hostName_(), operation.nameSpace}, std::move(operation.selection),

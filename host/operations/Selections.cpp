@@ -89,20 +89,6 @@ ObjectSelection effectiveSelection(const Operation& operation, const Repository&
     return selection;
 }
 
-CMPIFlags flagsOf(const Operation& operation)
-{
-    CMPIFlags flags = 0;
-    if (operation.selection.localOnly)
-        flags |= CMPI_FLAG_LocalOnly;
-    if (operation.deepInheritance)
-        flags |= CMPI_FLAG_DeepInheritance;
-    if (operation.selection.includeQualifiers)
-        flags |= CMPI_FLAG_IncludeQualifiers;
-    if (operation.selection.includeClassOrigin)
-        flags |= CMPI_FLAG_IncludeClassOrigin;
-    return flags;
-}
-
 PropertyNames::PropertyNames(const std::optional<std::vector<std::string>>& names)
 {
     if (!names)

@@ -6,8 +6,6 @@
 
 #include "host/cimxml/Operation.h"
 
-#include <cmpidt.h>
-
 #include <optional>
 #include <string>
 #include <vector>
@@ -24,9 +22,6 @@ class Repository;
 // REQUIRES: the operation's namespace is known.
 CimXml::ObjectSelection effectiveSelection(
     const CimXml::Operation& operation, const Repository& classes);
-
-// Returns the CMPI_FLAG_ bits of the operation.
-CMPIFlags flagsOf(const CimXml::Operation& operation);
 
 // A property list as CMPI passes it to providers. The names must outlive it.
 class PropertyNames {

@@ -32,7 +32,7 @@ ProviderClient::ProviderClient(const ProviderFiles& files)
         if (provider.servesAssociations)
             associations_.push_back(provider.className);
     }
-    request_.emplace(manager_.broker(), Host::RequestInfo{.nameSpace = nameSpace});
+    request_.emplace(manager_.broker());
 }
 
 std::optional<std::string> ProviderClient::declaredClass(std::string_view className) const

@@ -67,14 +67,6 @@ TEST_F(LifetimeTest, ObjectsOfANestedRequestLiveAsLongAsTheOuterOne)
     EXPECT_NE(CMNewString(mb, "still a request", nullptr), nullptr);
 }
 
-TEST_F(LifetimeTest, ANestedRequestHasItsOwnContext)
-{
-    Host::Request outer(broker, {.principal = "outer"});
-    Host::Request inner(broker, {.principal = "inner"});
-    EXPECT_EQ(textOf(CMGetContextEntry(outer.context().handle(), CMPIPrincipal, nullptr)), "outer");
-    EXPECT_EQ(textOf(CMGetContextEntry(inner.context().handle(), CMPIPrincipal, nullptr)), "inner");
-}
-
 TEST_F(LifetimeTest, NamesAreKeptOncePerRequest)
 {
     Host::Request request(broker);

@@ -195,7 +195,7 @@ TEST_F(TablesTest, OfferWhatShippedProvidersCallAndRefuseTheRest)
     expectAnswers(Host::Instance::functions, "-----ooo--");
     expectAnswers(Host::Enumeration::functions, "--oo-");
     expectAnswers(Host::DateTime::functions, "---o-");
-    expectAnswers(Host::Context::functions, "--o---");
+    expectAnswers(Host::Context::functions, "------");
     expectAnswers(Host::Result::functions, "---ooo-");
 }
 

@@ -1,8 +1,7 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// What providers are told of an operation, and what becomes of their success.
+// What providers are called with for an operation, and the responses made of their results.
 
-#include "host/broker/Context.h"
 #include "host/broker/Instance.h"
 #include "host/broker/ObjectPath.h"
 #include "tests/host/operations/ScriptedManager.h"
@@ -15,18 +14,6 @@ namespace {
 
 using testing::ElementsAre;
 using testing::HasSubstr;
-
-std::string entry(const ProviderCall& asked, const char* name)
-{
-    const Host::NamedValue* const found = Host::Context::of(asked.context)->entries().find(name);
-    return found == nullptr ? "none" : std::string(*found->value.text());
-}
-
-unsigned flags(const ProviderCall& asked)
-{
-    const auto& entries = Host::Context::of(asked.context)->entries();
-    return static_cast<unsigned>(*entries.find(CMPIInvocationFlags)->value.unsignedInteger());
-}
 
 std::vector<std::string> listed(const char** names)
 {
@@ -58,10 +45,9 @@ protected:
         });
     }
 
-    std::string ask(
-        const std::string& operation, const std::string& parameters = {}, const Caller& caller = {})
+    std::string ask(const std::string& operation, const std::string& parameters)
     {
-        const std::string answer = answerTo(*manager_, call(operation, parameters), caller);
+        const std::string answer = answerTo(*manager_, call(operation, parameters));
         EXPECT_EQ(errorIn(answer), "");
         return answer;
     }
@@ -70,42 +56,6 @@ protected:
     int calls_ = 0;
     const std::string ofThing_ = classOf("ClassName", "Thing");
 };
-
-TEST_F(DispatcherTest, ProvidersLearnWhoAsksForWhatNamespaceInWhichLanguage)
-{
-    onThings([](const ProviderCall& asked) {
-        EXPECT_EQ(entry(asked, CMPIPrincipal), "somebody");
-        EXPECT_EQ(entry(asked, CMPIAcceptLanguage), "de, en");
-        EXPECT_EQ(entry(asked, CMPIInitNameSpace), "root/test");
-    });
-    ask("EnumerateInstanceNames", ofThing_, {"somebody", "127.0.0.1", "de, en"});
-    EXPECT_EQ(calls_, 1);
-}
-
-TEST_F(DispatcherTest, WhatIsNotKnownOfTheCallerIsLeftOut)
-{
-    onThings([](const ProviderCall& asked) {
-        EXPECT_EQ(entry(asked, CMPIPrincipal), "none");
-        EXPECT_EQ(entry(asked, CMPIAcceptLanguage), "none");
-    });
-    ask("EnumerateInstanceNames", ofThing_);
-    EXPECT_EQ(calls_, 1);
-}
-
-TEST_F(DispatcherTest, FlagsAreThoseOfTheOperationWithoutLocalOnly)
-{
-    std::vector<unsigned> seen;
-    onThings([&seen](const ProviderCall& asked) { seen.push_back(flags(asked)); });
-    ask("EnumerateInstances", ofThing_);
-    ask("EnumerateInstances", ofThing_ + valueOf("DeepInheritance", "FALSE"));
-    ask("EnumerateInstances",
-        ofThing_ + valueOf("IncludeQualifiers", "TRUE") + valueOf("IncludeClassOrigin", "TRUE"));
-    ask("GetInstance", parameter("InstanceName", thing()) + valueOf("LocalOnly", "TRUE"));
-    EXPECT_THAT(seen,
-        ElementsAre(CMPI_FLAG_DeepInheritance, 0U,
-            CMPI_FLAG_DeepInheritance | CMPI_FLAG_IncludeQualifiers | CMPI_FLAG_IncludeClassOrigin,
-            0U));
-}
 
 TEST_F(DispatcherTest, PropertyListsArriveSpelledAsDeclaredAndWithoutWhatSaysNothing)
 {

@@ -84,11 +84,11 @@ TEST_F(PullTest, TheSelectionIsThatOfTheOpening)
 
 TEST_F(PullTest, OnlyWhoOpenedItMayPull)
 {
-    const std::string context = contextIn(open(0, {}, {"anna", "a", {}}));
-    EXPECT_THAT(errorIn(pull(context, 1, {"bert", "a", {}})), StartsWith("21"));
+    const std::string context = contextIn(open(0, {}, {"anna", "a"}));
+    EXPECT_THAT(errorIn(pull(context, 1, {"bert", "a"})), StartsWith("21"));
     EXPECT_THAT(errorIn(pull(context, 1)), StartsWith("21"));
     // From wherever.
-    EXPECT_EQ(errorIn(pull(context, 1, {"anna", "b", {}})), "");
+    EXPECT_EQ(errorIn(pull(context, 1, {"anna", "b"})), "");
 }
 
 TEST_F(PullTest, ItIsOpenAsLongAsWasAskedFor)
