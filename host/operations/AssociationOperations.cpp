@@ -41,42 +41,42 @@ void addNames(FoundObjects& found, const std::vector<const ClassDeclaration*>& c
 
 } // namespace
 
-void AssociationOperations::associators(
-    const Operation& operation, Request& request, FoundObjects& found) const
+void associators(const Manager& manager, const Repository& classes, const Operation& operation,
+    Request& request, FoundObjects& found)
 {
     if (operation.path == nullptr)
-        return addDeclarations(found, associatedClasses(classes_, operation));
+        return addDeclarations(found, associatedClasses(classes, operation));
     PropertyNames properties(operation.selection.properties);
-    addWhole(found, manager_.associators(request.context(), *operation.path,
+    addWhole(found, manager.associators(request.context(), *operation.path,
                         associationOf(operation), properties.get()));
 }
 
-void AssociationOperations::associatorNames(
-    const Operation& operation, Request& request, FoundObjects& found) const
+void associatorNames(const Manager& manager, const Repository& classes, const Operation& operation,
+    Request& request, FoundObjects& found)
 {
     if (operation.path == nullptr)
-        return addNames(found, associatedClasses(classes_, operation));
+        return addNames(found, associatedClasses(classes, operation));
     addWhole(found,
-        manager_.associatorNames(request.context(), *operation.path, associationOf(operation)));
+        manager.associatorNames(request.context(), *operation.path, associationOf(operation)));
 }
 
-void AssociationOperations::references(
-    const Operation& operation, Request& request, FoundObjects& found) const
+void references(const Manager& manager, const Repository& classes, const Operation& operation,
+    Request& request, FoundObjects& found)
 {
     if (operation.path == nullptr)
-        return addDeclarations(found, referringClasses(classes_, operation));
+        return addDeclarations(found, referringClasses(classes, operation));
     PropertyNames properties(operation.selection.properties);
-    addWhole(found, manager_.references(request.context(), *operation.path,
-                        associationOf(operation), properties.get()));
+    addWhole(found, manager.references(request.context(), *operation.path, associationOf(operation),
+                        properties.get()));
 }
 
-void AssociationOperations::referenceNames(
-    const Operation& operation, Request& request, FoundObjects& found) const
+void referenceNames(const Manager& manager, const Repository& classes, const Operation& operation,
+    Request& request, FoundObjects& found)
 {
     if (operation.path == nullptr)
-        return addNames(found, referringClasses(classes_, operation));
+        return addNames(found, referringClasses(classes, operation));
     addWhole(found,
-        manager_.referenceNames(request.context(), *operation.path, associationOf(operation)));
+        manager.referenceNames(request.context(), *operation.path, associationOf(operation)));
 }
 
 } // namespace Host

@@ -13,28 +13,16 @@ class Manager;
 class Repository;
 class Request;
 
-// Thread-safe. Each adds the objects to return; throws Refusal as the manager does. From a class
-// they return classes, as the association classes declare them.
-class AssociationOperations {
-public:
-    // Both must outlive it.
-    AssociationOperations(const Repository& classes, Manager& manager)
-        : classes_(classes), manager_(manager)
-    {
-    }
+// All are thread-safe, add the objects to return and throw Refusal as the manager does. From a
+// class they return classes, as the association classes declare them.
 
-    void associators(
-        const CimXml::Operation& operation, Request& request, FoundObjects& found) const;
-    void associatorNames(
-        const CimXml::Operation& operation, Request& request, FoundObjects& found) const;
-    void references(
-        const CimXml::Operation& operation, Request& request, FoundObjects& found) const;
-    void referenceNames(
-        const CimXml::Operation& operation, Request& request, FoundObjects& found) const;
-
-private:
-    const Repository& classes_;
-    Manager& manager_;
-};
+void associators(const Manager& manager, const Repository& classes,
+    const CimXml::Operation& operation, Request& request, FoundObjects& found);
+void associatorNames(const Manager& manager, const Repository& classes,
+    const CimXml::Operation& operation, Request& request, FoundObjects& found);
+void references(const Manager& manager, const Repository& classes,
+    const CimXml::Operation& operation, Request& request, FoundObjects& found);
+void referenceNames(const Manager& manager, const Repository& classes,
+    const CimXml::Operation& operation, Request& request, FoundObjects& found);
 
 } // namespace Host

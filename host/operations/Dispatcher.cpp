@@ -6,7 +6,9 @@
 #include "host/broker/Request.h"
 #include "host/cimxml/Message.h"
 #include "host/manager/Manager.h"
+#include "host/operations/AssociationOperations.h"
 #include "host/operations/ClassOperations.h"
+#include "host/operations/InstanceOperations.h"
 #include "host/operations/Selections.h"
 
 #include <utility>
@@ -31,7 +33,6 @@ CMPIrc statusCode(CMPIrc code)
 Dispatcher::Dispatcher(const Repository& classes, Manager& manager, HostName hostName,
     const OperationLimits& limits, OpenEnumerations::Clock clock)
     : classes_(classes), manager_(manager), hostName_(std::move(hostName)),
-      instances_(classes, manager), associations_(classes, manager),
       pulls_(limits, std::move(clock))
 {
 }
@@ -86,27 +87,27 @@ void Dispatcher::runToTheEnd(const Operation& operation, Request& request, Found
 {
     switch (operation.kind) {
     case Kind::getInstance:
-        return instances_.get(operation, request, found);
+        return getInstance(manager_, operation, request, found);
     case Kind::enumerateInstances:
     case Kind::openEnumerateInstances:
-        return instances_.enumerate(operation, request, found);
+        return enumerateInstances(manager_, operation, request, found);
     case Kind::enumerateInstanceNames:
     case Kind::openEnumerateInstancePaths:
-        return instances_.enumerateNames(operation, request, found);
+        return enumerateInstanceNames(manager_, operation, request, found);
     case Kind::getProperty:
-        return instances_.getProperty(operation, request, found);
+        return getProperty(manager_, classes_, operation, request, found);
     case Kind::associators:
     case Kind::openAssociatorInstances:
-        return associations_.associators(operation, request, found);
+        return associators(manager_, classes_, operation, request, found);
     case Kind::associatorNames:
     case Kind::openAssociatorInstancePaths:
-        return associations_.associatorNames(operation, request, found);
+        return associatorNames(manager_, classes_, operation, request, found);
     case Kind::references:
     case Kind::openReferenceInstances:
-        return associations_.references(operation, request, found);
+        return references(manager_, classes_, operation, request, found);
     case Kind::referenceNames:
     case Kind::openReferenceInstancePaths:
-        return associations_.referenceNames(operation, request, found);
+        return referenceNames(manager_, classes_, operation, request, found);
     case Kind::getClass:
         return getClass(classes_, operation, found);
     case Kind::enumerateClasses:

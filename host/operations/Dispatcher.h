@@ -5,9 +5,7 @@
 #pragma once
 
 #include "host/cimxml/OperationHandler.h"
-#include "host/operations/AssociationOperations.h"
 #include "host/operations/HostName.h"
-#include "host/operations/InstanceOperations.h"
 #include "host/operations/PullOperations.h"
 
 #include <memory>
@@ -15,6 +13,10 @@
 #include <string>
 
 namespace Host {
+
+class Manager;
+class Repository;
+class Request;
 
 class Dispatcher : public CimXml::OperationHandler {
 public:
@@ -40,8 +42,6 @@ private:
     const Repository& classes_;
     Manager& manager_;
     const HostName hostName_;
-    const InstanceOperations instances_;
-    const AssociationOperations associations_;
     PullOperations pulls_;
 };
 

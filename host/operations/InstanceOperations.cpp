@@ -16,49 +16,54 @@ namespace Host {
 
 using CimXml::Operation;
 
-void InstanceOperations::get(
-    const Operation& operation, Request& request, FoundObjects& found) const
-{
-    PropertyNames properties(operation.selection.properties);
-    found.add(&manager_.getInstance(request.context(), *operation.path, properties.get()));
-}
+namespace {
 
-void InstanceOperations::enumerate(
-    const Operation& operation, Request& request, FoundObjects& found) const
-{
-    PropertyNames properties(operation.selection.properties);
-    addWhole(
-        found, manager_.enumerateInstances(request.context(),
-                   request.makePath(operation.nameSpace, operation.className), properties.get()));
-}
-
-void InstanceOperations::enumerateNames(
-    const Operation& operation, Request& request, FoundObjects& found) const
-{
-    addWhole(found, manager_.enumerateInstanceNames(request.context(),
-                        request.makePath(operation.nameSpace, operation.className)));
-}
-
-void InstanceOperations::getProperty(
-    const Operation& operation, Request& request, FoundObjects& found) const
-{
-    const std::string& name = propertyOf(operation);
-    PropertyNames properties(name);
-    const Instance& instance =
-        manager_.getInstance(request.context(), *operation.path, properties.get());
-    const Value* const value = instance.property(name);
-    found.add(value == nullptr ? Value() : *value);
-}
-
-const std::string& InstanceOperations::propertyOf(const Operation& operation) const
+// Returns the name of the property as it is declared.
+const std::string& propertyOf(const Repository& classes, const Operation& operation)
 {
     const ClassDeclaration& declared =
-        knownClass(classes_, operation.nameSpace, operation.className);
+        knownClass(classes, operation.nameSpace, operation.className);
     const PropertyDeclaration* const property = declared.property(operation.propertyName);
     if (property == nullptr)
         throw Refusal(CMPI_RC_ERR_NO_SUCH_PROPERTY,
             "class " + declared.name + " has no property " + operation.propertyName);
     return property->name;
+}
+
+} // namespace
+
+void getInstance(
+    const Manager& manager, const Operation& operation, Request& request, FoundObjects& found)
+{
+    PropertyNames properties(operation.selection.properties);
+    found.add(&manager.getInstance(request.context(), *operation.path, properties.get()));
+}
+
+void enumerateInstances(
+    const Manager& manager, const Operation& operation, Request& request, FoundObjects& found)
+{
+    PropertyNames properties(operation.selection.properties);
+    addWhole(
+        found, manager.enumerateInstances(request.context(),
+                   request.makePath(operation.nameSpace, operation.className), properties.get()));
+}
+
+void enumerateInstanceNames(
+    const Manager& manager, const Operation& operation, Request& request, FoundObjects& found)
+{
+    addWhole(found, manager.enumerateInstanceNames(request.context(),
+                        request.makePath(operation.nameSpace, operation.className)));
+}
+
+void getProperty(const Manager& manager, const Repository& classes, const Operation& operation,
+    Request& request, FoundObjects& found)
+{
+    const std::string& name = propertyOf(classes, operation);
+    PropertyNames properties(name);
+    const Instance& instance =
+        manager.getInstance(request.context(), *operation.path, properties.get());
+    const Value* const value = instance.property(name);
+    found.add(value == nullptr ? Value() : *value);
 }
 
 } // namespace Host

@@ -13,31 +13,18 @@ class Manager;
 class Repository;
 class Request;
 
-// Thread-safe. Each adds the objects to return; throws Refusal as the manager does. The operation
-// has its effective selection.
-class InstanceOperations {
-public:
-    // Both must outlive it.
-    InstanceOperations(const Repository& classes, Manager& manager)
-        : classes_(classes), manager_(manager)
-    {
-    }
+// All are thread-safe, add the objects to return and throw Refusal as the manager does. The
+// operation has its effective selection.
 
-    void get(const CimXml::Operation& operation, Request& request, FoundObjects& found) const;
-    void enumerate(const CimXml::Operation& operation, Request& request, FoundObjects& found) const;
-    void enumerateNames(
-        const CimXml::Operation& operation, Request& request, FoundObjects& found) const;
+void getInstance(const Manager& manager, const CimXml::Operation& operation, Request& request,
+    FoundObjects& found);
+void enumerateInstances(const Manager& manager, const CimXml::Operation& operation,
+    Request& request, FoundObjects& found);
+void enumerateInstanceNames(const Manager& manager, const CimXml::Operation& operation,
+    Request& request, FoundObjects& found);
 
-    // Throws Refusal (CMPI_RC_ERR_NO_SUCH_PROPERTY) for one that the class does not have.
-    void getProperty(
-        const CimXml::Operation& operation, Request& request, FoundObjects& found) const;
-
-private:
-    // The name as it is declared.
-    const std::string& propertyOf(const CimXml::Operation& operation) const;
-
-    const Repository& classes_;
-    Manager& manager_;
-};
+// Throws Refusal (CMPI_RC_ERR_NO_SUCH_PROPERTY) for a property that the class does not have.
+void getProperty(const Manager& manager, const Repository& classes,
+    const CimXml::Operation& operation, Request& request, FoundObjects& found);
 
 } // namespace Host
