@@ -20,13 +20,24 @@ namespace {
 
 namespace peg = tao::pegtl;
 
-// What the actions work on: the file, what it declares, and what it may include.
+// The state of the actions: the file, its declarations and what its includes are compiled with.
 struct Unit {
     Compiler& compiler;
     Namespaces& namespaces;
-    const std::filesystem::path& file;
+    const std::vector<std::filesystem::path>& includeStack; // ends with the file itself
     FileCompiler declarations;
 };
+
+// Throws at the pragma when the file is among those that include it.
+void include(Unit& unit, const Literal& argument)
+{
+    const auto file = unit.includeStack.back().parent_path() / argument.text;
+    std::error_code noSuchFile; // which compileFile reports
+    for (const auto& including : unit.includeStack)
+        if (std::filesystem::equivalent(including, file, noSuchFile))
+            throw peg::parse_error(argument.text + " includes itself", argument.position);
+    unit.compiler.compileFile(file, unit.declarations.nameSpace().name());
+}
 
 Namespace& openNamespace(Namespaces& namespaces, std::string_view written)
 {
@@ -140,12 +151,11 @@ struct Action<Grammar::Pragma> {
     static void apply0(Unit& unit)
     {
         DeclarationParts& parts = unit.declarations.parts;
-        const std::string argument = std::exchange(parts.value, {}).elements.front().text;
+        const Literal argument = std::exchange(parts.value, {}).elements.front();
         if (equalNames(parts.pragmaName.text, "namespace"))
-            unit.declarations.setNamespace(openNamespace(unit.namespaces, argument));
+            unit.declarations.setNamespace(openNamespace(unit.namespaces, argument.text));
         else
-            unit.compiler.compileFile(
-                unit.file.parent_path() / argument, unit.declarations.nameSpace().name());
+            include(unit, argument);
     }
 };
 
@@ -164,9 +174,11 @@ void Compiler::compileText(
     std::string_view text, const std::filesystem::path& file, std::string_view nameSpace)
 {
     peg::memory_input<> input(text.data(), text.size(), file.string());
-    Unit unit{
-        *this, namespaces_, file, {openNamespace(namespaces_, nameSpace), referencedClasses_}};
+    includeStack_.push_back(file);
+    Unit unit{*this, namespaces_, includeStack_,
+        {openNamespace(namespaces_, nameSpace), referencedClasses_}};
     peg::parse<Grammar::File, Action, Control>(input, unit);
+    includeStack_.pop_back();
 }
 
 std::unique_ptr<const Repository> Compiler::finish() &&

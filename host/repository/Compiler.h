@@ -27,12 +27,13 @@ using Namespaces = std::vector<std::unique_ptr<Namespace>>;
 // are declared before they are used, in the same file or an earlier one; classes that references
 // name may follow later.
 //
-// `#pragma include ("other.mof")` compiles the other file, relative to the folder of the one it
-// stands in. `#pragma namespace ("root/interop")` holds for the rest of the file and for the
-// files that are included there.
+// `#pragma include ("other.mof")` compiles the other file, whose path is relative to the folder of
+// the including one; a file that includes itself, also through others, is an error. `#pragma
+// namespace ("root/interop")` holds for the rest of the file and for the files that are included
+// there.
 //
 // For one thread. Every function throws std::runtime_error `FILE:LINE:COLUMN: reason` for what is
-// wrong with a text; the compiler is good for nothing but destruction afterwards.
+// wrong with a text; the compiler can only be destroyed afterwards.
 class Compiler {
 public:
     // Also throws std::runtime_error `FILE: reason` for a file that cannot be read.
@@ -49,6 +50,7 @@ public:
 private:
     Namespaces namespaces_;
     std::vector<ReferencedClass> referencedClasses_;
+    std::vector<std::filesystem::path> includeStack_; // the files that are being compiled
 };
 
 } // namespace Host

@@ -47,6 +47,27 @@ TEST_F(PragmaTest, ErrorsNameTheIncludedFile)
     EXPECT_EQ(errorOf(file), included + ": No such file or directory");
 }
 
+TEST_F(PragmaTest, AFileThatIncludesItselfIsAnError)
+{
+    const std::string own = folder_.write("own.mof", "\n#pragma include (\"own.mof\")");
+    EXPECT_EQ(errorOf(own), own + ":2:18: own.mof includes itself");
+    std::filesystem::create_directory(folder_.path() / "sub");
+    const std::string inner = folder_.write("sub/b.mof", "#pragma include (\"../a.mof\")");
+    const std::string outer = folder_.write("a.mof", "#pragma include (\"sub/b.mof\")");
+    EXPECT_EQ(errorOf(outer), inner + ":1:18: ../a.mof includes itself");
+}
+
+TEST_F(PragmaTest, AFileIsIncludedAsOftenAsNamespacesNeedIt)
+{
+    folder_.write("b.mof", "class B {};");
+    const auto repository = compileFile(folder_.write("a.mof", R"(
+        #pragma include ("b.mof")
+        #pragma namespace ("root/two")
+        #pragma include ("b.mof"))"));
+    EXPECT_NE(repository->findClass(NameSpace, "B"), nullptr);
+    EXPECT_NE(repository->findClass("root/two", "B"), nullptr);
+}
+
 TEST_F(PragmaTest, ANamespaceHoldsForTheRestOfTheFileAndWhatItIncludes)
 {
     folder_.write("b.mof", "class B {};\n#pragma namespace (\"root/three\")\nclass C {};");
