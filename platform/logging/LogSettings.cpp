@@ -2,11 +2,8 @@
 
 #include "platform/logging/LogSettings.h"
 
-#include "platform/logging/SinkSetting.h"
-
 #include <charconv>
 #include <cstdlib>
-#include <optional>
 #include <string_view>
 
 namespace RynLog {
@@ -61,6 +58,20 @@ void readSink(const char* variable, std::string& sink, std::string& problem)
 }
 
 } // namespace
+
+std::optional<SinkSetting> parseSinkSetting(const std::string& text)
+{
+    constexpr std::string_view filePrefix = "file:";
+    if (text == "off")
+        return SinkSetting{SinkSetting::Kind::off};
+    if (text == "syslog")
+        return SinkSetting{SinkSetting::Kind::syslog};
+    if (text == "stderr")
+        return SinkSetting{SinkSetting::Kind::standardError};
+    if (text.starts_with(filePrefix) && text.size() > filePrefix.size())
+        return SinkSetting{SinkSetting::Kind::file, text.substr(filePrefix.size())};
+    return std::nullopt;
+}
 
 LogSettings settingsFromEnvironment()
 {

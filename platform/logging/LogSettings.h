@@ -4,6 +4,7 @@
 
 #pragma once
 
+#include <optional>
 #include <string>
 
 namespace RynLog {
@@ -18,6 +19,17 @@ struct LogSettings {
 // Reads the environment with secure_getenv; an empty variable counts as not set. A value that makes
 // no sense is named in `problem`, and its default is used.
 LogSettings settingsFromEnvironment();
+
+// The parsed value of RYNLOG_LOG or RYNLOG_TRACE.
+struct SinkSetting {
+    enum class Kind { off, syslog, standardError, file };
+
+    Kind kind = Kind::off;
+    std::string path{}; // of a file; never empty for one
+};
+
+// Parses syslog, stderr, file:PATH and off; returns nothing for any other text.
+std::optional<SinkSetting> parseSinkSetting(const std::string& text);
 
 // Replaces the settings in effect, which are at first those of the environment. Lines that other
 // threads are writing are finished with the settings they began with. A `problem` becomes the

@@ -2,7 +2,7 @@
 
 #pragma once
 
-#include "platform/logging/SinkSetting.h"
+#include "platform/logging/LogSettings.h"
 
 #include <memory>
 
