@@ -120,9 +120,8 @@ bool getSensorInstances(std::vector<Sensor>& vectSensor)
             if (harvestType(type, vectSensor))
                 nothing = false;
         } catch (const std::exception& error) {
-            // The copy is deliberately of the base class: its generic text is printed.
-            const std::exception generic = error;
-            RynLog::writeToStandardError(std::string(generic.what()) + '\n');
+            // The text printed is deliberately the generic one of the base class.
+            RynLog::writeToStandardError(std::string(error.std::exception::what()) + '\n');
         }
     }
     traced.exiting(HarvestLines::getSensorInstances.exit);
@@ -155,7 +154,7 @@ bool getSensorEnabledLogCapInstances(std::vector<SensorEnabledLogCap>& vectSenso
         [&] { return parameterList(" vectSensorEnabledLogCap=", &vectSensorEnabledLogCap); });
     traced.entering(HarvestLines::getSensorEnabledLogCapInstances.entry);
     try {
-        vectSensorEnabledLogCap.push_back(SensorEnabledLogCap());
+        vectSensorEnabledLogCap.emplace_back();
     } catch (const std::exception& error) {
         RynLog::writeToStandardError(std::string(error.what()) + '\n');
         traced.exiting(HarvestLines::getSensorEnabledLogCapInstancesFailed);

@@ -7,6 +7,8 @@
 #include "providers/AssociationWalk.h"
 #include "providers/SensorElementCapabilities.h"
 
+#include <array>
+
 namespace Vorn::SensorProfileProvider {
 
 using namespace ElementCapabilities;
@@ -107,11 +109,12 @@ int sensorElementCapabilitiesCMPIInstances(
     PairWalk walk(request, instanceFailures, op, &status);
     walk.reserve(out);
     // The filter's keys deliberately differ from the references of this association.
-    const char* keys[] = {"Antecedent", "Dependent", nullptr};
-    const WalkEnd end = walk.run([&](const CMPIObjectPath* association,
-                                     const References& references) {
-        out.push_back(newAssociation(request.broker(), association, references, properties, keys));
-    });
+    std::array<const char*, 3> keys = {"Antecedent", "Dependent", nullptr};
+    const WalkEnd end =
+        walk.run([&](const CMPIObjectPath* association, const References& references) {
+            out.push_back(
+                newAssociation(request.broker(), association, references, properties, keys.data()));
+        });
     if (end == WalkEnd::atSensors) {
         traceToBroker(request.broker(), CMPI_LEV_WARNING, SensorElementCapabilitiesProvider,
             "***Can't get Sensor ObjectPaths.             Exiting EnumerateInstanceNames***");

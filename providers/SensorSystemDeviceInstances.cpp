@@ -6,6 +6,8 @@
 #include "providers/AssociationWalk.h"
 #include "providers/SensorSystemDevice.h"
 
+#include <array>
+
 namespace Vorn::SensorProfileProvider {
 
 using namespace SystemDevice;
@@ -110,11 +112,12 @@ int sensorSystemDeviceCMPIInstances(const CMPIObjectPath* op, const char** prope
     CMPIStatus status = {CMPI_RC_OK, nullptr};
     PairWalk walk(request, instanceFailures, ctx, op, &status);
     walk.reserve(out);
-    const char* keys[] = {"GroupComponent", "PartComponent", nullptr};
-    const WalkEnd end = walk.run([&](const CMPIObjectPath* association,
-                                     const References& references) {
-        out.push_back(newAssociation(request.broker(), association, references, properties, keys));
-    });
+    std::array<const char*, 3> keys = {"GroupComponent", "PartComponent", nullptr};
+    const WalkEnd end =
+        walk.run([&](const CMPIObjectPath* association, const References& references) {
+            out.push_back(
+                newAssociation(request.broker(), association, references, properties, keys.data()));
+        });
     // After the other ends there is no exit mark.
     if (end == WalkEnd::complete || end == WalkEnd::withoutSystemPath)
         request.marks().exit();

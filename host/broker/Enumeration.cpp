@@ -10,7 +10,7 @@ namespace Host {
 
 Enumeration& Enumeration::make(Arena& arena, std::span<const Value> elements)
 {
-    Value* const copy = arena.makeArray<Value>(elements.size());
+    auto* const copy = arena.makeArray<Value>(elements.size());
     std::copy(elements.begin(), elements.end(), copy);
     return arena.make<Enumeration>(std::span<const Value>(copy, elements.size()));
 }

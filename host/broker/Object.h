@@ -57,7 +57,7 @@ public:
     static constexpr Kind kindOfSelf = itsKind;
 
     // Returns the object behind a handle; null for a null handle, one without an object and one
-    // of another kind. CMPI passes objects as const also where it lets them be changed.
+    // of another kind. CMPI passes objects as const even to functions that change them.
     static Self* of(const Handle* handle) noexcept
     {
         const Object* const object = behind(handle);
@@ -66,7 +66,11 @@ public:
         return const_cast<Self*>(static_cast<const Self*>(object));
     }
 
-    // What providers get.
+    // A handle contains the address of its object.
+    Encapsulated(const Encapsulated&) = delete;
+    Encapsulated& operator=(const Encapsulated&) = delete;
+
+    // Returns the handle by which providers refer to the object.
     Handle* handle() const noexcept { return &handle_; }
 
 protected:
@@ -74,10 +78,6 @@ protected:
     {
     }
     ~Encapsulated() = default;
-
-    // A handle contains the address of its object.
-    Encapsulated(const Encapsulated&) = delete;
-    Encapsulated& operator=(const Encapsulated&) = delete;
 
 private:
     mutable Handle handle_;

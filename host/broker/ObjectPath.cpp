@@ -74,7 +74,7 @@ std::string ObjectPath::toText() const
 
 ObjectPath& ObjectPath::copiedTo(Arena& arena) const
 {
-    ObjectPath& copy = arena.make<ObjectPath>(*nameSpace_, *host_, *className_);
+    auto& copy = arena.make<ObjectPath>(*nameSpace_, *host_, *className_);
     copy.keys_ = keys_.shared();
     return copy;
 }

@@ -15,7 +15,7 @@
 namespace Host::CimXml {
 
 // Appends VALUE, VALUE.ARRAY or VALUE.REFERENCE (DSP0201); nothing for a null. A null in an array
-// is left out, since not all clients know VALUE.NULL. An embedded instance is the text of its
+// is left out, since not all clients support VALUE.NULL. An embedded instance is the text of its
 // INSTANCE.
 void writeValue(std::string& out, const Value& value);
 
@@ -41,7 +41,7 @@ private:
     };
 
     const Frame& frameFor(std::string_view property, CMPIType valueType);
-    Frame makeFrame(std::string_view property, CMPIType valueType) const;
+    Frame makeFrame(std::string_view name, CMPIType valueType) const;
 
     ObjectSelection selection_;
     const ClassDeclaration* declared_ = nullptr;

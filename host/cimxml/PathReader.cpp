@@ -188,7 +188,7 @@ Value PathReader::keyValue(
     const Element& element, const std::string& what, const PropertyDeclaration* declared) const
 {
     const CMPIType type = declared == nullptr ? namedType(element, what) : declared->type;
-    const std::string text = element.content();
+    const std::string& text = element.content();
     Arena& arena = Arena::required();
     const auto value = type == CMPI_null ? readNumber(arena, text) : readLiteral(arena, type, text);
     if (!value)

@@ -20,6 +20,7 @@ template <typename Objects>
 Enumeration& enumerationOf(const Objects& objects)
 {
     std::vector<Value> elements;
+    elements.reserve(objects.size());
     for (const auto* const object : objects)
         elements.push_back(Value::of(*object));
     return Enumeration::make(Arena::required(), elements);
@@ -59,7 +60,7 @@ void report(const ProviderRegistration& provider, const Refusal& refusal)
             refusal.what());
 }
 
-// Asks the providers in turn and returns what all of them have found.
+// Calls the providers in turn and returns the objects of all.
 template <typename Ask>
 CollectedResult askEach(const Routing::Registrations& providers, const Ask& ask)
 {

@@ -36,7 +36,7 @@ private:
     void addProfile();
     Instance& add(const char* className);
     void setText(Instance& instance, const char* name, std::string_view text);
-    void setCodes(Instance& instance, const char* name, unsigned code);
+    void setCodes(Instance& instance, const char* name, unsigned only);
 
     const Repository& classes_;
     Arena& arena_ = Arena::required();

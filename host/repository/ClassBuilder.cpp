@@ -95,8 +95,10 @@ void ClassBuilder::add(PropertyDeclaration property, const SourcePosition& posit
 std::unique_ptr<ClassDeclaration> ClassBuilder::finish()
 {
     const ClassDeclaration* const above = class_->superclass;
-    const bool inheritsKeys = above != nullptr && !above->keys.empty();
-    class_->keys = inheritsKeys ? above->keys : std::move(ownKeys_);
+    if (above != nullptr && !above->keys.empty())
+        class_->keys = above->keys;
+    else
+        class_->keys = std::move(ownKeys_);
     return std::move(class_);
 }
 

@@ -7,6 +7,8 @@
 
 #include <tao/pegtl.hpp>
 
+#include <array>
+
 namespace Host::Grammar {
 
 namespace peg = tao::pegtl;
@@ -19,7 +21,10 @@ struct Blanks : peg::star<peg::sor<peg::space, LineComment>> {};
 template <typename Rule>
 struct Token : peg::seq<Rule, Blanks> { static constexpr const char* expected = Rule::expected; };
 template <char c>
-struct Mark : peg::seq<peg::one<c>, Blanks> { static constexpr char expected[] = {c, '\0'}; };
+struct Mark : peg::seq<peg::one<c>, Blanks> {
+    static constexpr std::array text = {c, '\0'};
+    static constexpr const char* expected = text.data();
+};
 template <typename Text>
 struct Keyword : peg::seq<Text, peg::not_at<peg::identifier_other>, Blanks> {};
 template <typename Rule, typename End>

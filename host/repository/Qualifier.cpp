@@ -28,13 +28,13 @@ const Qualifier* findQualifier(const QualifierList& qualifiers, std::string_view
 
 bool isQualified(const QualifierList& qualifiers, std::string_view name)
 {
-    const bool* const value = valueOf<bool>(qualifiers, name);
+    const auto* const value = valueOf<bool>(qualifiers, name);
     return value != nullptr && *value;
 }
 
 std::string_view qualifierText(const QualifierList& qualifiers, std::string_view name)
 {
-    const std::string* const value = valueOf<std::string>(qualifiers, name);
+    const auto* const value = valueOf<std::string>(qualifiers, name);
     return value == nullptr ? std::string_view() : std::string_view(*value);
 }
 

@@ -118,7 +118,7 @@ private:
 
     std::string takePlain()
     {
-        const std::string text(rest_.substr(0, rest_.find(',')));
+        std::string text(rest_.substr(0, rest_.find(',')));
         rest_.remove_prefix(text.size());
         return text;
     }

@@ -23,6 +23,7 @@ std::vector<std::filesystem::path> places()
 {
     const auto here = std::filesystem::read_symlink("/proc/self/exe").parent_path();
     std::vector<std::filesystem::path> found;
+    found.reserve(folders.size());
     for (const char* const folder : folders)
         found.push_back((here / folder).lexically_normal());
     return found;

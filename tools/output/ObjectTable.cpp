@@ -97,6 +97,7 @@ std::string objectTable(const Objects& objects, std::size_t width, bool isColore
     const std::vector<std::string> properties = columnsOf(objects);
     const bool showsClass = properties.empty() || areOfSeveralClasses(objects);
     std::vector<Column> columns;
+    columns.reserve(properties.size() + 1);
     for (const std::string& property : properties)
         columns.push_back({titleOf(printable(property))});
     if (showsClass)
@@ -104,6 +105,7 @@ std::string objectTable(const Objects& objects, std::size_t width, bool isColore
     Table table(columns);
     for (const Host::Instance* const object : objects) {
         std::vector<Cell> cells;
+        cells.reserve(columns.size());
         for (const std::string& property : properties)
             cells.push_back(cellOf(*object, property));
         if (showsClass)

@@ -46,7 +46,7 @@ MachineFileCache::Outcome MachineFileCache::find(const std::string& path)
         if (known != outcomes_.end() && known->second.stamp == present)
             return known->second;
     }
-    const Outcome outcome = read(path);
+    Outcome outcome = read(path);
     if (isSettled(outcome.stamp))
         keep(path, outcome);
     return outcome;

@@ -19,7 +19,7 @@
 #include <unordered_map>
 #include <utility>
 
-#include <locale.h>
+#include <locale.h> // NOLINT(modernize-deprecated-headers): <clocale> need not declare newlocale
 
 namespace Vorn {
 
