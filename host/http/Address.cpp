@@ -75,15 +75,15 @@ std::string Address::text() const
     return text + ":" + std::to_string(port());
 }
 
-std::string Address::neighbourhood() const
+std::string Address::network() const
 {
     if (!isIpv6() || isLoopback())
         return host();
     constexpr std::size_t bytesOfNetwork = 8;
-    Address network = *this;
-    auto& bytes = std::get<::sockaddr_in6>(network.address_).sin6_addr.s6_addr;
+    Address prefix = *this;
+    auto& bytes = std::get<::sockaddr_in6>(prefix.address_).sin6_addr.s6_addr;
     std::fill(bytes + bytesOfNetwork, bytes + sizeof bytes, std::uint8_t{0});
-    return network.host() + "/64";
+    return prefix.host() + "/64";
 }
 
 const ::sockaddr* Address::raw() const

@@ -29,9 +29,9 @@ public:
     std::string host() const;
     // Returns a text such as 127.0.0.1:5988 or [::1]:5988.
     std::string text() const;
-    // Returns the host of an IPv4 address. Returns the network of 64 bits of an IPv6 address, since
-    // its host can use any address in it.
-    std::string neighbourhood() const;
+    // Returns the network to which limits for an address apply: the host of an IPv4 address, and
+    // the 64-bit network of an IPv6 address, since an IPv6 host can use any address in its network.
+    std::string network() const;
 
     const ::sockaddr* raw() const;
     ::socklen_t size() const;

@@ -54,10 +54,11 @@ ClientConnection* Connections::add(
 bool Connections::hasRoomFor(const Address& client)
 {
     const bool areTooMany = all_.size() >= limits_.maximumConnections;
-    const auto neighbours = std::count_if(all_.begin(), all_.end(),
-        [neighbourhood = client.neighbourhood()](
-            const ClientConnection& each) { return each.neighbourhood == neighbourhood; });
-    if (!areTooMany && static_cast<std::size_t>(neighbours) < limits_.maximumConnectionsPerAddress)
+    const auto ofNetwork = std::count_if(
+        all_.begin(), all_.end(), [network = client.network()](const ClientConnection& each) {
+            return each.network == network;
+        });
+    if (!areTooMany && static_cast<std::size_t>(ofNetwork) < limits_.maximumConnectionsPerAddress)
         return true;
     const auto now = Clock::now();
     if (!lastComplaint_ || now - *lastComplaint_ >= complaintInterval) {
@@ -164,7 +165,7 @@ void Connections::closeOverdue()
         if (now < connection.deadline)
             continue;
         ::shutdown(connection.descriptor, SHUT_RDWR);
-        mention({"closeOverdue", "Connections", __LINE__},
+        reportDetail({"closeOverdue", "Connections", __LINE__},
             "a client at " + connection.address + " is too slow");
     }
 }

@@ -31,14 +31,14 @@ enum class Phase {
 struct ClientConnection {
     ClientConnection(
         int socket, const Address& client, std::shared_ptr<const Certificate> shownCertificate)
-        : descriptor(socket), address(client.host()), neighbourhood(client.neighbourhood()),
+        : descriptor(socket), address(client.host()), network(client.network()),
           certificate(std::move(shownCertificate))
     {
     }
 
     const int descriptor;
     const std::string address;                            // for the log
-    const std::string neighbourhood;                      // for the limits of an address
+    const std::string network;                            // for the limits of an address
     const std::shared_ptr<const Certificate> certificate; // null without TLS
 
     // Guarded by the mutex of Connections.

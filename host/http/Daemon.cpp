@@ -137,7 +137,7 @@ void* requestBegins(void* service, const char* uri, MHD_Connection* connection) 
             client->target = target;
             return nullptr;
         }
-        mention({"requestBegins", "Daemon", __LINE__},
+        reportDetail({"requestBegins", "Daemon", __LINE__},
             "a request from " + client->address + " has too many arguments");
     } catch (...) {
         report({"requestBegins", "Daemon", __LINE__}, "no memory for a request");
@@ -186,7 +186,7 @@ void logLine(void*, const char* format, std::va_list arguments) noexcept
     while (line.ends_with('\n'))
         line.remove_suffix(1);
     try {
-        mention({"logLine", "Daemon", __LINE__}, std::string(line));
+        reportDetail({"logLine", "Daemon", __LINE__}, std::string(line));
     } catch (...) {
         return; // the line is lost
     }

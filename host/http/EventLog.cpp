@@ -82,13 +82,13 @@ void report(const Place& place, const std::string& text) noexcept
     writeLine(place, levelOfMessages, text);
 }
 
-void mention(const Place& place, const std::string& text) noexcept
+void reportDetail(const Place& place, const std::string& text) noexcept
 {
-    if (isMentionWanted())
+    if (areDetailsLogged())
         writeLine(place, levelOfDetails, text);
 }
 
-bool isMentionWanted() noexcept
+bool areDetailsLogged() noexcept
 {
     return RynLog::RynLogger::isWanted(levelOfDetails);
 }

@@ -19,10 +19,10 @@ struct Place {
 // Writes a message for the administrator.
 void report(const Place& place, const std::string& text) noexcept;
 
-// Writes a detail about a single client or request. By default the log does not keep them.
-void mention(const Place& place, const std::string& text) noexcept;
-// Returns whether the log keeps details.
-bool isMentionWanted() noexcept;
+// Writes a detail about a single client or request. By default, the log level suppresses details.
+void reportDetail(const Place& place, const std::string& text) noexcept;
+// Returns whether details are written at the current log level.
+bool areDetailsLogged() noexcept;
 
 // Returns why the log could not write the last line; empty when it could.
 std::string logProblem() noexcept;

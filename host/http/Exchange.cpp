@@ -83,10 +83,10 @@ bool Exchange::isPasswordRight(const Credentials& credentials)
     for (;;) {
         auto slot = takeSlot(service_.work);
         const auto now = std::chrono::steady_clock::now();
-        const auto admission = signIns.admit(client_.neighbourhood, now);
+        const auto admission = signIns.admit(client_.network, now);
         if (admission <= now) {
             const auto refusal =
-                signIns.tryPassword(credentials, client_.address, client_.neighbourhood, now);
+                signIns.tryPassword(credentials, client_.address, client_.network, now);
             slot.reset();
             if (refusal)
                 service_.connections.waitUntil(*refusal);
@@ -103,8 +103,8 @@ bool Exchange::refuse()
 {
     // A client that still sends would not see an answer before it has finished, or not at all:
     // libmicrohttpd closes connections that are answered before the end of the body.
-    const bool isBodyBearable = bodySize_.bytes.value_or(0) <= 2 * service_.limits.maximumBody;
-    if (!isBodyBearable || bodySize_.isAwaited || error_->endsConnection())
+    const bool canDiscardBody = bodySize_.bytes.value_or(0) <= 2 * service_.limits.maximumBody;
+    if (!canDiscardBody || bodySize_.isAwaited || error_->endsConnection())
         return sendError();
     enter(Phase::receiving);
     state_ = State::discarding;
@@ -212,8 +212,8 @@ bool Exchange::sendError()
 
 bool Exchange::send(Response& response, unsigned status)
 {
-    if (isMentionWanted())
-        mention({"send", "Exchange", __LINE__}, summary(status));
+    if (areDetailsLogged())
+        reportDetail({"send", "Exchange", __LINE__}, summary(status));
     state_ = State::answered;
     enter(Phase::answering);
     return response.queue(connection_, status);

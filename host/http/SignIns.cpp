@@ -35,7 +35,8 @@ SignInMemory::SignInMemory()
         throw std::runtime_error("the system gives no random numbers");
 }
 
-bool SignInMemory::knows(const Credentials& credentials, const std::string& address, Time now) const
+bool SignInMemory::contains(
+    const Credentials& credentials, const std::string& address, Time now) const
 {
     const auto found = until_.find(digestOf(credentials, address));
     return found != until_.end() && now < found->second;
@@ -43,7 +44,7 @@ bool SignInMemory::knows(const Credentials& credentials, const std::string& addr
 
 bool SignInMemory::remember(const Credentials& credentials, const std::string& address, Time now)
 {
-    const bool wasKnown = knows(credentials, address, now);
+    const bool wasKnown = contains(credentials, address, now);
     makeRoom(
         until_, capacity, [now](Time until) { return until <= now; }, std::less<>());
     until_.insert_or_assign(digestOf(credentials, address), now + lifetime);
@@ -100,17 +101,17 @@ void SignIns::replacePasswords(std::shared_ptr<const Passwords> passwords)
 bool SignIns::isKnown(const Credentials& credentials, const std::string& address, Time now) const
 {
     const std::lock_guard lock(mutex_);
-    return memory_.knows(credentials, address, now);
+    return memory_.contains(credentials, address, now);
 }
 
-SignIns::Time SignIns::admit(const std::string& neighbourhood, Time now)
+SignIns::Time SignIns::admit(const std::string& network, Time now)
 {
     const std::lock_guard lock(mutex_);
-    return delays_.admit(neighbourhood, now);
+    return delays_.admit(network, now);
 }
 
 std::optional<SignIns::Time> SignIns::tryPassword(const Credentials& credentials,
-    const std::string& address, const std::string& neighbourhood, Time now)
+    const std::string& address, const std::string& network, Time now)
 {
     const auto current = passwords();
     if (!current)
@@ -121,7 +122,7 @@ std::optional<SignIns::Time> SignIns::tryPassword(const Credentials& credentials
             "wrong password for \"" + credentials.user + "\" from " + address);
     std::unique_lock lock(mutex_);
     if (!isRight)
-        return delays_.fail(neighbourhood, now);
+        return delays_.fail(network, now);
     // A password of a file that was replaced meanwhile is not remembered.
     const bool isNew = passwords_ != current ||
                        memory_.remember(credentials, address, std::chrono::steady_clock::now());

@@ -33,8 +33,8 @@ public:
     // Throws std::runtime_error when the system provides no random key.
     SignInMemory();
 
-    bool knows(const Credentials& credentials, const std::string& address, Time now) const;
-    // Returns whether they were not known.
+    bool contains(const Credentials& credentials, const std::string& address, Time now) const;
+    // Returns whether the sign-in was not yet in the memory.
     bool remember(const Credentials& credentials, const std::string& address, Time now);
     void forgetAll() { until_.clear(); }
 
@@ -64,7 +64,7 @@ public:
     // failures before, the next password waits as if this one had failed already: several
     // connections guess no faster than one.
     Time admit(const std::string& address, Time now);
-    // Counts a failure. Returns when the client may be told.
+    // Counts a failure. Returns when it may be answered.
     Time fail(const std::string& address, Time now);
 
     std::size_t size() const { return failures_.size(); }
@@ -103,14 +103,14 @@ public:
 
     // Returns whether the client signed in lately from this address. Takes no hash.
     bool isKnown(const Credentials& credentials, const std::string& address, Time now) const;
-    // Returns when a password from the neighbourhood may be tried (see SignInDelays).
-    Time admit(const std::string& neighbourhood, Time now);
+    // Returns when a password from the network may be tried (see SignInDelays).
+    Time admit(const std::string& network, Time now);
     // Checks the password against its hash, which takes long. Returns nothing when it is right or
-    // none is demanded any more. For a wrong one, returns when the client may be told: counted from
-    // now, the beginning, so that the time does not tell what the user's hash cost. The log names
-    // the user and the address, once for a right password that stays known.
+    // none is demanded any more. For a wrong one, returns when it may be answered: that time counts
+    // from the beginning of the check and so does not reveal the cost of the user's hash. The log
+    // names the user and the address, once for a right password that stays in the memory.
     std::optional<Time> tryPassword(const Credentials& credentials, const std::string& address,
-        const std::string& neighbourhood, Time now);
+        const std::string& network, Time now);
 
 private:
     std::shared_ptr<const Passwords> passwords() const;

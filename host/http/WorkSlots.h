@@ -41,7 +41,8 @@ public:
     }
 
 private:
-    // A slot that somebody waits for never becomes free: a newcomer could take it first.
+    // Hands the slot to a waiting thread directly: were it free meanwhile, another thread could
+    // take it.
     void release()
     {
         const std::lock_guard lock(mutex_);

@@ -82,9 +82,9 @@ TEST(ListenPolicyTest, NamesAreNoAddresses)
 
 TEST(AddressTest, NeighboursShareANetwork)
 {
-    EXPECT_EQ(Address("192.0.2.1", 1).neighbourhood(), "192.0.2.1");
-    EXPECT_EQ(Address("2001:db8:1:2:3:4:5:6", 1).neighbourhood(), "2001:db8:1:2::/64");
-    EXPECT_EQ(Address("::1", 1).neighbourhood(), "::1");
+    EXPECT_EQ(Address("192.0.2.1", 1).network(), "192.0.2.1");
+    EXPECT_EQ(Address("2001:db8:1:2:3:4:5:6", 1).network(), "2001:db8:1:2::/64");
+    EXPECT_EQ(Address("::1", 1).network(), "::1");
 }
 
 TEST(ListenTest, AnyPortIsTheSameForAllAddresses)

@@ -40,19 +40,19 @@ TEST(SignInMemoryTest, ForgetsInTimeAndWhenThereAreTooMany)
     const SignInMemory::Time start{};
     EXPECT_TRUE(memory.remember({"ann", "secret"}, "a", start));
     EXPECT_FALSE(memory.remember({"ann", "secret"}, "a", start));
-    EXPECT_FALSE(memory.knows({"ann", "secret"}, "b", start));
-    EXPECT_TRUE(memory.knows({"ann", "secret"}, "a", start));
-    EXPECT_FALSE(memory.knows({"ann", "secre"}, "a", start));
-    EXPECT_FALSE(memory.knows({"ann", "secrett"}, "a", start));
-    EXPECT_FALSE(memory.knows({"anns", "ecret"}, "a", start));
-    EXPECT_TRUE(memory.knows({"ann", "secret"}, "a", start + SignInMemory::lifetime - 1s));
-    EXPECT_FALSE(memory.knows({"ann", "secret"}, "a", start + SignInMemory::lifetime));
+    EXPECT_FALSE(memory.contains({"ann", "secret"}, "b", start));
+    EXPECT_TRUE(memory.contains({"ann", "secret"}, "a", start));
+    EXPECT_FALSE(memory.contains({"ann", "secre"}, "a", start));
+    EXPECT_FALSE(memory.contains({"ann", "secrett"}, "a", start));
+    EXPECT_FALSE(memory.contains({"anns", "ecret"}, "a", start));
+    EXPECT_TRUE(memory.contains({"ann", "secret"}, "a", start + SignInMemory::lifetime - 1s));
+    EXPECT_FALSE(memory.contains({"ann", "secret"}, "a", start + SignInMemory::lifetime));
     for (std::size_t i = 0; i < SignInMemory::capacity; ++i)
         memory.remember({"user" + std::to_string(i), "p"}, "a", start + 1s);
-    EXPECT_FALSE(memory.knows({"ann", "secret"}, "a", start + 1s));
-    EXPECT_TRUE(memory.knows({"user0", "p"}, "a", start + 1s));
+    EXPECT_FALSE(memory.contains({"ann", "secret"}, "a", start + 1s));
+    EXPECT_TRUE(memory.contains({"user0", "p"}, "a", start + 1s));
     memory.forgetAll();
-    EXPECT_FALSE(memory.knows({"user0", "p"}, "a", start + 1s));
+    EXPECT_FALSE(memory.contains({"user0", "p"}, "a", start + 1s));
 }
 
 TEST(SignInDelaysTest, GrowWithEachFailureOfAnAddress)
