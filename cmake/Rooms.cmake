@@ -18,8 +18,8 @@ function(sensor_profile_room name)
 endfunction()
 
 # sensor_profile_test(NAME [FILES_APART] SOURCES ... USES libraries ... [ENVIRONMENT variables ...])
-# One GoogleTest executable, registered with CTest. The test framework's headers, the dearest of
-# each test file, are compiled once and shared.
+# Adds one GoogleTest executable and registers it with CTest. The test framework's headers, which take
+# most of the time of each test file, are compiled once and shared.
 function(sensor_profile_test name)
   cmake_parse_arguments(test "FILES_APART" "" "SOURCES;USES;ENVIRONMENT" ${ARGN})
   sensor_profile_test_executable(${name} ${test_SOURCES})

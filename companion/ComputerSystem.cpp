@@ -12,12 +12,13 @@ namespace Vorn::Companion {
 
 namespace {
 
-// Stands for this provider. Never changes, or every machine would get a new identifier.
+// Identifies this provider in the hash. It never changes, or every machine would get a new
+// identifier.
 constexpr sd_id128_t application = {{0xb3, 0xdf, 0xdc, 0xbb, 0x7a, 0x28, 0x45, 0xc0, 0xb6, 0x17,
     0x6d, 0xa2, 0x1f, 0x2a, 0x76, 0x2d}};
 
-// Returns the machine's identifier for this provider as the text of a UUID: machine-id(5) asks to
-// keep the identifier itself confidential. There is none before a first boot is complete.
+// Returns the machine's identifier for this provider as the text of a UUID: by machine-id(5), the
+// identifier itself is confidential. There is none before a first boot is complete.
 std::optional<std::string> machineId()
 {
     sd_id128_t identifier{};

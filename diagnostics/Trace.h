@@ -83,7 +83,7 @@ struct TraceLocation {
 };
 
 // Writes one trace point to the log channel, then to the trace channel. `line` formats the text; it
-// is called once for each channel, or not at all when neither wants the level.
+// is called once for each channel, or not at all when neither writes the level.
 template <typename Line>
 void emit(const TraceLocation& at, const std::string& component, int level, const Line& line)
 {

@@ -51,7 +51,7 @@ CMPIInstance* SensorFactory::makeSensorEnabledLogicalElementCapInstance(const CM
     if (isUsable(instance)) {
         const InstanceWriter writer(broker, instance);
         writer.setText("InstanceID", snsrCap.getInstanceID());
-        if (selection.wants("RequestedStatesSupported") &&
+        if (selection.selects("RequestedStatesSupported") &&
             !writer.setCodes("RequestedStatesSupported", snsrCap.getStatesSupported(), rc))
             // The texts differ in one letter.
             reportFailure(broker, rc, SensorEnabledLogicalElementCapabilitiesProvider,

@@ -7,7 +7,7 @@
 
 namespace Vorn::SensorProfileProvider {
 
-// Selects the optional properties of a class that a request wants: exactly those in its property
+// Selects the optional properties of a class for a request: exactly those in its property
 // list (case matters); without a list all, or none when only an object path is needed.
 class PropertySelection {
 public:
@@ -19,7 +19,7 @@ public:
             names_.insert(*properties);
     }
 
-    bool wants(const char* name) const { return all_ || names_.contains(name); }
+    bool selects(const char* name) const { return all_ || names_.contains(name); }
 
 private:
     bool all_;

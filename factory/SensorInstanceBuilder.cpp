@@ -109,9 +109,9 @@ private:
     void setNames() const
     {
         const std::string name = sensor_.getElementName();
-        if (selection_.wants("Caption"))
+        if (selection_.selects("Caption"))
             writer_.setText("Caption", localised(L"MSGID_SENSOR_CAPTION", name));
-        if (selection_.wants("Description"))
+        if (selection_.selects("Description"))
             writer_.setText("Description", localised(L"MSGID_SENSOR_DESCRIPTION", name));
         setText("Name", name);
         setText("ElementName", name);
@@ -120,7 +120,7 @@ private:
 
     void setPossibleStates() const
     {
-        if (!selection_.wants("PossibleStates"))
+        if (!selection_.selects("PossibleStates"))
             return;
         const std::vector<std::string> states = sensor_.getPossibleStates();
         if (static_cast<std::uint16_t>(states.size()) == 0)
@@ -135,7 +135,7 @@ private:
         setCode("SensorType", sensor_.getSensorType());
         setCode("EnabledState", sensor_.getEnabledState());
         setCode("RequestedState", sensor_.getRequestedState());
-        if (selection_.wants("HealthState")) {
+        if (selection_.selects("HealthState")) {
             writer_.setCode("HealthState", sensor_.getHealthState());
             writer_.setText("Status", sensor_.getHealthStatus()); // never without HealthState
         }
@@ -155,19 +155,19 @@ private:
 
     void setText(const char* name, const std::string& text) const
     {
-        if (selection_.wants(name))
+        if (selection_.selects(name))
             writer_.setText(name, text);
     }
 
     void setCode(const char* name, std::uint16_t code) const
     {
-        if (selection_.wants(name))
+        if (selection_.selects(name))
             writer_.setCode(name, code);
     }
 
     void setNumber(const char* name, std::int32_t number) const
     {
-        if (selection_.wants(name))
+        if (selection_.selects(name))
             writer_.setNumber(name, number);
     }
 
@@ -180,7 +180,7 @@ private:
 
     bool setCodes(const char* name, const std::vector<std::uint16_t>& codes) const
     {
-        return !selection_.wants(name) || writer_.setCodes(name, codes, rc_);
+        return !selection_.selects(name) || writer_.setCodes(name, codes, rc_);
     }
 
     Sensor& sensor_;

@@ -19,7 +19,7 @@ public:
     {
     }
 
-    // Reserves room for one object for each sensor.
+    // Reserves capacity for one object per sensor.
     template <typename Object>
     void reserve(std::vector<Object*>& objects)
     {

@@ -17,7 +17,7 @@ namespace {
 constexpr const char* upcallFailed = "Call to CBEnumInstances of target Class Failed.";
 
 // Returns whether the result class of a request is absent, the class or its standard superclass.
-bool wants(const char* resultClass, const char* className, const char* standardClass)
+bool isIncluded(const char* resultClass, const char* className, const char* standardClass)
 {
     return resultClass == nullptr || isSameName(resultClass, className) ||
            isSameName(resultClass, standardClass);
@@ -84,14 +84,14 @@ CMPIStatus associators(const char* function, ResultKind kind, const CMPIContext*
         return ok; // another provider's source or association
     }
     if (isOfClass(target, ComputerSystemClass, &status)) {
-        if (!wants(resultClass, ComputerSystemClass, "CIM_ComputerSystem"))
+        if (!isIncluded(resultClass, ComputerSystemClass, "CIM_ComputerSystem"))
             return ok; // without an exit mark
         if (!returnSystems(request, kind, ctx, rslt, target, &status)) {
             request.marks().failure(upcallFailed);
             return status; // without an exit mark
         }
     } else if (isOfClass(target, SensorClass, &status)) {
-        if (!wants(resultClass, SensorClass, "CIM_NumericSensor"))
+        if (!isIncluded(resultClass, SensorClass, "CIM_NumericSensor"))
             return ok; // without an exit mark
         const FetchFailure failure =
             returnSensors(request, kind, rslt, op, properties, factory, &status);

@@ -29,7 +29,8 @@ public:
     // Returns the broker behind a handle; null when there is none of this kind.
     static const Broker* of(const CMPIBroker* handle) noexcept;
 
-    // Sets who answers up-calls; null (the default) for nobody. REQUIRES: no request is running.
+    // Sets the object that answers up-calls; by default there is none. REQUIRES: no request is
+    // running.
     void setUpcalls(BrokerUpcalls* upcalls) noexcept { upcalls_ = upcalls; }
     // Sets what is known about classes; null (the default) for nothing. REQUIRES: as above.
     void setClassInformation(const ClassInformation* classes) noexcept { classes_ = classes; }

@@ -11,7 +11,7 @@ class Enumeration;
 class ObjectPath;
 
 // Called on the provider's thread with the provider's context; an implementation may call
-// providers in turn. What it returns lives in the thread's current arena. An operation fails by
+// providers in turn. The objects returned are in the thread's current arena. An operation fails by
 // throwing Refusal with the status code.
 class BrokerUpcalls {
 public:

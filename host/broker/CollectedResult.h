@@ -32,7 +32,7 @@ public:
     void close() noexcept { isDone_ = true; }
     // Adds the objects and refusals of the other one.
     void append(const CollectedResult& other);
-    // Removes the objects of which the predicate does not want the class.
+    // Removes the objects for whose class the predicate is false.
     void keepOnly(const std::function<bool(std::string_view className)>& isWanted);
 
 private:

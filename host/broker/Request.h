@@ -16,11 +16,11 @@ class Broker;
 class Instance;
 class ObjectPath;
 
-// All objects made while it lasts go with it, unless somebody holds on to its arena. A request
-// made while another one is active on the thread, as in an up-call, uses the arena of that one:
-// its objects can be handed to the caller and go with the outermost request.
+// The objects made during a request are destroyed with it, unless its arena is shared. A request
+// made while another one is active on the thread, as in an up-call, uses the arena of that one: its
+// objects can be returned to the caller and are destroyed with the outermost request.
 //
-// Stays on the stack of its thread; the last one made ends first.
+// REQUIRES: a request stays on its thread; the last one made on it is destroyed first.
 class Request {
 public:
     // The broker must outlive the request.
@@ -30,8 +30,8 @@ public:
     Request& operator=(const Request&) = delete;
 
     Arena& arena() const noexcept { return arena_; }
-    // For objects that are to outlive the request: they do while somebody holds this. Null for a
-    // request within another one.
+    // Returns the arena, whose objects live as long as a copy of this pointer; null for a request
+    // within another one.
     const std::shared_ptr<Arena>& shareArena() const noexcept { return own_; }
     Context& context() noexcept { return context_; }
 

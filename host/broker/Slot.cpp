@@ -12,7 +12,7 @@ CMPIStatus makeStatus(CMPIrc code, const char* reason) noexcept
         if (Arena* const arena = Arena::current())
             return {code, String::make(*arena, reason).handle()};
     } catch (const std::bad_alloc&) {
-        // The code alone has to do.
+        // The status is returned without a message.
     }
     return {code, nullptr};
 }

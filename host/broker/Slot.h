@@ -1,8 +1,8 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
 // Slot<function> fills one slot of a CMPI function table with an ordinary C++ function that
-// takes a reference to the object behind the handle. It keeps what every slot has to do in
-// one place: an absent or handle-less object answers CMPI_RC_ERR_INVALID_HANDLE, an exception
+// takes a reference to the object behind the handle. It implements what all slots have in common:
+// an absent or handle-less object answers CMPI_RC_ERR_INVALID_HANDLE, an exception
 // becomes a status, and the status pointer, which may be null, is written.
 
 #pragma once
@@ -53,7 +53,8 @@ struct SelfOf<Answer (Self::*)(Rest...) const noexcept(nothrow)> {
     using type = Self;
 };
 
-// C++ answers as CMPI wants them: objects become handles, numbers the slot's type.
+// Converts what a C++ function returns to the type of the slot: objects become handles, numbers are
+// cast.
 template <typename Answer, typename Given>
 Answer answerOf(Given&& given)
 {

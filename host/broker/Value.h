@@ -23,8 +23,8 @@ class String;
 // to the arena it was made in and is never changed through the value.
 class Value {
 public:
-    // How deep paths may stand in one another in what clients send: each level doubles the
-    // backslashes of what stands in it.
+    // The number of levels to which clients may nest paths in keys: each level doubles the
+    // backslashes of the levels inside it.
     static constexpr unsigned maximumNesting = 8;
 
     // A null value without a type.

@@ -62,7 +62,7 @@ public:
 
     Element read(std::string_view text)
     {
-        // Expat would read UTF-16, which it recognises by these bytes, whatever it was told.
+        // Expat reads UTF-16, which it recognises by these bytes, whatever encoding was set.
         if (text.starts_with('\xFE') || text.starts_with('\xFF') ||
             text.substr(0, 2).find('\0') != std::string_view::npos)
             fail("only the encoding UTF-8 is read");

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The elements of a request that the protocol knows (DSP0201).
+// The elements of the protocol in a request (DSP0201).
 
 #pragma once
 
@@ -61,8 +61,8 @@ private:
     std::string text_;
 };
 
-// Reads a text as XML 1.0 in UTF-8 and returns its outermost element. What the protocol does not
-// know, elements as well as attributes, is left out, as DSP0200 demands of servers. A document
+// Reads a text as XML 1.0 in UTF-8 and returns its outermost element. Elements and attributes that
+// are not of the protocol are skipped, as DSP0200 requires of servers. A document
 // type declaration is refused, so that no entity is declared and nothing expands. Takes time and
 // memory in proportion to the text. Throws RequestError: requestNotWellFormed, or requestNotValid
 // for a document type declaration and beyond the bounds.

@@ -116,7 +116,7 @@ void appendNumber(std::string& out, Number number)
 }
 
 // Appends the shortest text that reads back as the same number, with the decimal point that
-// DSP0004 wants.
+// DSP0004 requires.
 template <typename Number>
 void appendReal(std::string& out, Number number)
 {

@@ -12,7 +12,7 @@ namespace Host::CimXml {
 
 class Message;
 
-// The client that sent a message, as the transport knows it.
+// The client that sent a message, as the transport identified it.
 struct Caller {
     std::string principal; // the authenticated user; empty without authentication
     std::string address;   // for the log

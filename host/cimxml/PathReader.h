@@ -20,7 +20,7 @@ std::string nameSpaceOf(const Element& localNameSpacePath);
 
 // Reads paths with the names of namespaces, classes and keys spelled as they are declared, and with
 // keys of the declared types. Where the class is not known the client's spelling stays, and
-// VALUETYPE or TYPE tell the type of a key; without either it is a string.
+// VALUETYPE or TYPE gives the type of a key; without either it is a string.
 //
 // Paths live in the arena of this thread's request. All functions throw RequestError for
 // elements that lack something, and Refusal: CMPI_RC_ERR_INVALID_PARAMETER with the key's name

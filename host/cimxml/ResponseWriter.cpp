@@ -13,7 +13,8 @@ namespace Host::CimXml {
 
 namespace {
 
-// An arena for the path that an instance makes, so that none is left in the request's.
+// Makes an arena of its own current, so that the path which an instance makes is not kept with the
+// request.
 class ScratchArena {
 public:
     ScratchArena() : before_(Arena::makeCurrent(&arena_)) {}

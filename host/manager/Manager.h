@@ -64,8 +64,8 @@ public:
     const Instance& getInstance(
         const Context& context, const ObjectPath& path, const char** properties) const;
 
-    // Each association class that leads away from the source is asked by its own name. Results
-    // are of the result class or below it, whether their provider cares or not.
+    // The provider of each association class that refers to the source's class is called with that
+    // class's name. Results of other classes than the result class and its subclasses are removed.
     CollectedResult associators(const Context& context, const ObjectPath& source,
         const Association& association, const char** properties) const;
     CollectedResult associatorNames(

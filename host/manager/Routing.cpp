@@ -15,10 +15,10 @@ namespace Host {
 
 namespace {
 
-// Whether the name is the wanted one; null wants any.
-bool matches(std::string_view name, const char* wanted)
+// Returns whether the name is the expected one; null stands for any.
+bool matches(std::string_view name, const char* expected)
 {
-    return wanted == nullptr || equalNames(name, wanted);
+    return expected == nullptr || equalNames(name, expected);
 }
 
 } // namespace

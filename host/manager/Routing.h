@@ -20,7 +20,8 @@ class ObjectPath;
 class Routing {
 public:
     using Registrations = std::vector<const ProviderRegistration*>;
-    // What a client asks of an association (DSP0200, Associators); null for what it left out.
+    // The filters of an association operation (DSP0200, Associators); null for those that are
+    // absent.
     struct Association {
         const char* associationClass = nullptr;
         const char* resultClass = nullptr;

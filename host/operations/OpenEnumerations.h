@@ -18,8 +18,8 @@
 
 namespace Host {
 
-// The client that opened an enumeration, and what it pulls. Others neither pull from it nor learn
-// that it exists.
+// The client that opened an enumeration, and what it pulls. For others the
+// enumeration does not exist.
 struct EnumerationOwner {
     std::string principal;
     std::string nameSpace;

@@ -38,9 +38,9 @@ struct NameOrder {
     }
 };
 
-// As the first class has each that has such a property: not every provider knows a name that is
-// spelled otherwise. What no class has selects nothing and is left out, and what comes twice is
-// there once: a client's list may be as long as a request, and each instance is held against it.
+// Returns the names as the first class with such a property spells them, since providers may
+// compare letter case. Names that no class has are left out, and repeated names occur once: a
+// client's list may be as long as a request, and each instance is compared with it.
 std::vector<std::string> spelledAsDeclared(
     const Namespace& nameSpace, const std::vector<std::string>& names)
 {
@@ -54,13 +54,13 @@ std::vector<std::string> spelledAsDeclared(
             if (property->declaredIn == declared.get() && wanted.erase(property->name) != 0)
                 spelled.push_back(property->name);
     }
-    // A provider that takes an empty list for none must not send everything.
+    // Providers may treat an empty list as no list and return all properties.
     if (spelled.empty() && !names.empty())
         spelled.push_back(names.front());
     return spelled;
 }
 
-// The properties of the class that are selected.
+// Limits the selection to properties of the class.
 void limitTo(const ClassDeclaration& declared, ObjectSelection& selection)
 {
     std::vector<std::string> properties;

@@ -21,7 +21,7 @@ public:
     // already, and unless it carries Override exactly when it is inherited.
     void add(PropertyDeclaration property, const SourcePosition& position);
 
-    // Hands the class over. The builder is good for nothing but destruction afterwards.
+    // Moves the class to the caller. The builder can only be destroyed afterwards.
     std::unique_ptr<ClassDeclaration> finish();
 
 private:

@@ -27,7 +27,7 @@ Scalar toNumber(const Literal& literal, CMPIType type)
     Number value = 0;
     const char* const end = literal.text.data() + literal.text.size();
     const auto result = std::from_chars(literal.text.data(), end, value);
-    // What is left beyond the bits of the type is 0, or -1 of a negative number.
+    // The bits beyond those of the type are all 0, or all 1 in a negative number.
     const Number rest = (value >> (plainSize(type) * 8 - 1)) >> (isUnsignedType(type) ? 1 : 0);
     const bool fits = rest == 0 || (isSignedType(type) && rest == static_cast<Number>(-1));
     if (result.ec != std::errc() || result.ptr != end || !fits)

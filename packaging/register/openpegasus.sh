@@ -5,7 +5,7 @@
 
 modules=(SensorProfileModule SensorProfileComputerSystemModule)
 
-# Sets `registered` to those of our modules that OpenPegasus knows.
+# Sets `registered` to those of our modules that are registered with OpenPegasus.
 find_registered_modules() {
   local list each options=(--namespace NAMESPACE)
   list=$(cimprovider -l) ||

@@ -33,7 +33,7 @@ std::unique_ptr<spdlog::logger> makeLogger(const SinkSetting& setting)
     return logger;
 }
 
-// One step above every level, so that the level test alone answers for closed channels.
+// These lie outside the range of levels, so that comparing levels covers closed channels, too.
 constexpr long long nothingWanted = std::numeric_limits<long long>::max();
 constexpr long long notConfigured = std::numeric_limits<long long>::min();
 

@@ -17,7 +17,7 @@ std::string_view textOrNull(const char* text)
     return text != nullptr ? text : "(null)";
 }
 
-// Doubling backslashes tells those of the text from those of escapes.
+// Backslashes are doubled to distinguish those of the text from those of escapes.
 void appendEscaped(std::string& line, std::string_view text)
 {
     Text::appendEscaped(line, text, Text::Backslash::doubled);

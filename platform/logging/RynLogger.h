@@ -35,7 +35,7 @@ public:
         int reservedSecond, const std::string& text) noexcept;
 
     // Whether a line of the level would be written to either channel. Costs one relaxed atomic
-    // load, so that a caller need not compose a line that nobody wants.
+    // load, so that a caller need not compose a line that is not written.
     static bool isWanted(int level) noexcept;
 
     // Returns why the log channel's file could not be opened or its last line not be written; empty

@@ -89,7 +89,7 @@ protected:
 
 std::shared_ptr<spdlog::sinks::sink> openFile(const std::string& path)
 {
-    // Non-blocking, as a pipe that nobody reads must not hold up a request.
+    // Non-blocking, since a pipe without a reader must not block a request.
     constexpr int flags = O_WRONLY | O_CREAT | O_APPEND | O_CLOEXEC | O_NOCTTY | O_NONBLOCK;
     constexpr mode_t ownerWritesGroupReads = 0640;
     const int descriptor = ::open(path.c_str(), flags, ownerWritesGroupReads);

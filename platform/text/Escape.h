@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Control characters made visible, so that a text stays on its line and no terminal obeys it.
+// Escapes control characters, so that a text stays on its line and does not control a terminal.
 
 #pragma once
 

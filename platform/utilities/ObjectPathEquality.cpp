@@ -75,7 +75,7 @@ std::optional<std::vector<Key>> keysOf(const CMPIObjectPath* path, bool compares
 bool equalPaths(
     const CMPIObjectPath* a, const CMPIObjectPath* b, bool comparesReferences, int depth);
 
-// Compares two values; each overload knows one type.
+// Compares two values; there is an overload for each type.
 struct ValueEquality {
     bool comparesReferences;
     int depth;

@@ -96,8 +96,8 @@ std::vector<std::string> modelFiles()
     return files;
 }
 
-// Writes the first line of the log. Throws std::runtime_error when the log does not take it: a
-// server does not start without a log. One that loses it later continues.
+// Writes the first line of the log. Throws std::runtime_error when it cannot be written: a
+// server does not start without a log. It continues when the log fails later.
 void beginLog(const std::string& text, Output& out)
 {
     report({"beginLog", "ServeCommand", __LINE__}, text);
