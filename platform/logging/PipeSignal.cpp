@@ -3,8 +3,10 @@
 #include "platform/logging/PipeSignal.h"
 
 #include <cerrno>
+#include <climits>
 #include <ctime>
 
+#include <poll.h>
 #include <unistd.h>
 
 namespace RynLog {
@@ -49,9 +51,19 @@ int writeWhole(int descriptor, std::string_view bytes) noexcept
     return error;
 }
 
-void writeToStandardError(std::string_view text) noexcept
+// The descriptor stays blocking, since other processes share that setting.
+int writeToStandardError(std::string_view text) noexcept
 {
-    writeWhole(STDERR_FILENO, text);
+    int error = 0;
+    while (!text.empty() && error == 0) {
+        ::pollfd state{STDERR_FILENO, POLLOUT, 0};
+        if (::poll(&state, 1, 0) != 1)
+            return EAGAIN;
+        const std::string_view piece = text.substr(0, PIPE_BUF);
+        error = writeWhole(STDERR_FILENO, piece);
+        text.remove_prefix(piece.size());
+    }
+    return error;
 }
 
 } // namespace RynLog

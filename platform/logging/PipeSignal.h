@@ -29,7 +29,9 @@ private:
 // written.
 int writeWhole(int descriptor, std::string_view bytes) noexcept;
 
-// One write to the process's standard error, so that lines of several threads stay whole.
-void writeToStandardError(std::string_view text) noexcept;
+// Does the same on the process's standard error, but never blocks: where its reader does not read,
+// the rest is not written (EAGAIN). A text of up to PIPE_BUF bytes is one write, so that lines of
+// several threads stay whole.
+int writeToStandardError(std::string_view text) noexcept;
 
 } // namespace RynLog

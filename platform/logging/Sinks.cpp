@@ -32,46 +32,58 @@ std::runtime_error failure(const std::string& verb, const std::string& what, int
         "cannot " + verb + " " + what + ": " + std::generic_category().message(error));
 }
 
-// One line is one write to an open file, unbuffered, so that lines of several threads and
-// processes stay whole.
 class DescriptorSink : public LockedSink {
-public:
-    DescriptorSink(int descriptor, std::string name)
+protected:
+    explicit DescriptorSink(std::string name)
         : LockedSink(std::make_unique<spdlog::pattern_formatter>(
               "%Y-%m-%dT%H:%M:%S.%fZ %v", spdlog::pattern_time_type::utc, "\n")),
-          descriptor_(descriptor), name_(std::move(name))
+          name_(std::move(name))
     {
     }
 
-protected:
+    // Returns 0 or an errno.
+    virtual int write(std::string_view line) noexcept = 0;
+
     void sink_it_(const spdlog::details::log_msg& message) override
     {
         spdlog::memory_buf_t line;
         formatter_->format(message, line);
-        if (const int error = writeWhole(descriptor_, std::string_view(line.data(), line.size())))
+        if (const int error = write({line.data(), line.size()}))
             throw failure("write", name_, error);
     }
 
     void flush_() override {}
 
 private:
-    int descriptor_;
     std::string name_;
 };
 
+class StandardErrorSink : public DescriptorSink {
+public:
+    StandardErrorSink() : DescriptorSink("the log to standard error") {}
+
+protected:
+    int write(std::string_view line) noexcept override { return writeToStandardError(line); }
+};
+
+// One line is one write to an open file, unbuffered, so that lines of several threads and
+// processes stay whole.
 class FileSink : public DescriptorSink {
 public:
     // Owns the descriptor.
     FileSink(int descriptor, std::string name)
-        : DescriptorSink(descriptor, std::move(name)), owned_(descriptor)
+        : DescriptorSink(std::move(name)), descriptor_(descriptor)
     {
     }
-    ~FileSink() override { ::close(owned_); }
+    ~FileSink() override { ::close(descriptor_); }
     FileSink(const FileSink&) = delete;
     FileSink& operator=(const FileSink&) = delete;
 
+protected:
+    int write(std::string_view line) noexcept override { return writeWhole(descriptor_, line); }
+
 private:
-    int owned_;
+    int descriptor_;
 };
 
 // Never calls openlog or closelog: the identity belongs to the process.
@@ -109,7 +121,7 @@ std::shared_ptr<spdlog::sinks::sink> makeSink(const SinkSetting& setting)
     case SinkSetting::Kind::syslog:
         return std::make_shared<SyslogSink>();
     case SinkSetting::Kind::standardError:
-        return std::make_shared<DescriptorSink>(STDERR_FILENO, "the log to standard error");
+        return std::make_shared<StandardErrorSink>();
     case SinkSetting::Kind::file:
         return openFile(setting.path);
     case SinkSetting::Kind::off:

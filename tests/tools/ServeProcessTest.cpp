@@ -131,6 +131,16 @@ TEST_F(ServeProcessTest, LogWhoseReaderIsGoneDoesNotHinderIt)
     EXPECT_EQ(server.end(SIGTERM).code, 0);
 }
 
+TEST_F(ServeProcessTest, LogThatNobodyReadsDoesNotHinderIt)
+{
+    // The pipe of 64 KiB has room for the first lines only.
+    ServerProcess server(withModel(), {{"RYNLOG_LEVEL", "4000"}},
+        script("exec 2> >(sleep 30)\nhead -c 60K /dev/zero >&2\nexec " + sensorctl + " \"$@\""));
+    for (int i = 0; i < 50; ++i)
+        EXPECT_EQ(ask(HttpClient(server.port())).status, 200);
+    EXPECT_EQ(server.end(SIGTERM).code, 0);
+}
+
 TEST_F(ServeProcessTest, OutputThatCannotBeWrittenIsAFailure)
 {
     const Ended ended = run(asIs(), {.out = RunOptions::Out::file, .outFile = "/dev/full"});

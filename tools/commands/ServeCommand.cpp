@@ -133,8 +133,8 @@ bool serve(Host::Http::Server& server, const Protection& protection, const Signa
         notifyServiceManager("READY=1");
     }
     notifyServiceManager("STOPPING=1");
-    report({"serve", "ServeCommand", __LINE__}, "ending");
     server.beginShutdown();
+    report({"serve", "ServeCommand", __LINE__}, "ending");
     constexpr std::chrono::milliseconds interval{20};
     const auto end = std::chrono::steady_clock::now() + gracePeriod;
     while (!server.waitUntilIdle(interval)) {

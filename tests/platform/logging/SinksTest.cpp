@@ -178,6 +178,25 @@ TEST(StandardErrorSinkTest, ABrokenPipeDoesNotEndTheProcess)
     EXPECT_EQ(::sigismember(&pending, SIGPIPE), 0);
 }
 
+TEST(StandardErrorSinkTest, APipeThatNobodyReadsIsNotWaitedFor)
+{
+    std::array<int, 2> ends{};
+    ASSERT_EQ(::pipe(ends.data()), 0);
+    const int standardError = ::dup(STDERR_FILENO);
+    ASSERT_GE(::dup2(ends[1], STDERR_FILENO), 0);
+    std::string problem;
+    {
+        const ScopedLogSettings settings({6000, "stderr", "off"});
+        for (int i = 0; i < 20; ++i) // the pipe holds 64 KiB
+            logLine(std::string(10'000, 'x'));
+        problem = RynLogger::logProblem();
+    }
+    ::dup2(standardError, STDERR_FILENO);
+    for (const int descriptor : {standardError, ends[0], ends[1]})
+        ::close(descriptor);
+    EXPECT_EQ(problem, "cannot write the log to standard error: Resource temporarily unavailable");
+}
+
 TEST(OffSinkTest, NothingIsWantedAndNothingPrinted)
 {
     testing::internal::CaptureStderr();
