@@ -31,7 +31,7 @@ constexpr std::uint64_t aDay = 86'400;
 
 const std::vector<Limit> limits = {{"max-body", 1U << 20U, 1024, 1U << 30U},
     {"max-header", 16'384, 1024, 1U << 20U}, {"max-depth", 64, 16, 1024},
-    {"max-connections", 256, 1, many}, {"max-connections-per-address", 64, 1, many},
+    {"max-connections", 256, 1, 4000}, {"max-connections-per-address", 64, 1, many},
     {"workers", 4, 1, 256}, {"max-queue", 128, 1, many},
     {"max-unsent-objects", 200'000, 1, veryMany}, {"idle-timeout", 60, 1, aDay},
     {"request-timeout", 30, 1, aDay}, {"answer-timeout", 600, 1, aDay},

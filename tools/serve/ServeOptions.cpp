@@ -28,6 +28,8 @@ struct Bounds {
 };
 
 constexpr std::uint64_t many = 100'000;
+// The unit of the service allows 4096 descriptors.
+constexpr std::uint64_t mostConnections = 4000;
 constexpr std::uint64_t veryMany = 100'000'000;
 constexpr std::uint64_t aDay = 86'400; // in seconds
 
@@ -89,8 +91,9 @@ void addHttpLimits(CLI::App& parser, Host::Http::Limits& limits)
         "Size of a request's first line and header fields", "BYTES");
     addCount(parser, "--max-depth", limits.maximumDepth, {16, 1024},
         "XML elements in one another in a request");
-    addCount(parser, "--max-connections", limits.maximumConnections, {1, many},
-        "Connections at a time, of all clients");
+    addCount(parser, "--max-connections", limits.maximumConnections, {1, mostConnections},
+        "Connections at a time, of all clients; each takes a\n"
+        "thread and a file descriptor");
     addCount(parser, "--max-connections-per-address", limits.maximumConnectionsPerAddress,
         {1, many},
         "Connections at a time from one address; an IPv6 network\n"
