@@ -21,6 +21,7 @@ struct User {
     ::gid_t group;
 };
 
+// Returns nothing where there is no such user, for which getpwnam_r may return an error too.
 std::optional<User> findUser(const std::string& name)
 {
     ::passwd entry{};
@@ -30,7 +31,9 @@ std::optional<User> findUser(const std::string& name)
     while (
         (error = ::getpwnam_r(name.c_str(), &entry, texts.data(), texts.size(), &found)) == ERANGE)
         texts.resize(2 * texts.size());
-    if (error != 0 || found == nullptr)
+    if (error != 0 && error != ENOENT && error != ESRCH)
+        throw std::system_error(error, std::generic_category(), "cannot look for user " + name);
+    if (found == nullptr)
         return std::nullopt;
     return User{entry.pw_uid, entry.pw_gid};
 }
