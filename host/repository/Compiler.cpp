@@ -164,7 +164,8 @@ struct Action<Grammar::Pragma> {
 void Compiler::compileFile(const std::filesystem::path& file, std::string_view nameSpace)
 {
     std::ifstream stream(file, std::ios::binary);
-    if (!stream)
+    stream.peek(); // fails for a folder, which can be opened
+    if (stream.fail())
         throw std::runtime_error(file.string() + ": " + std::generic_category().message(errno));
     const std::string text((std::istreambuf_iterator<char>(stream)), {});
     compileText(text, file, nameSpace);

@@ -45,6 +45,8 @@ TEST_F(PragmaTest, ErrorsNameTheIncludedFile)
     EXPECT_EQ(errorOf(file), included + ":2:11: C is no declared class");
     std::filesystem::remove(included);
     EXPECT_EQ(errorOf(file), included + ": No such file or directory");
+    std::filesystem::create_directory(included);
+    EXPECT_EQ(errorOf(file), included + ": Is a directory");
 }
 
 TEST_F(PragmaTest, AFileThatIncludesItselfIsAnError)
