@@ -64,7 +64,7 @@ std::optional<Value> readInteger(CMPIType type, std::string_view text)
 
 std::optional<Value> readReal(CMPIType type, std::string_view text)
 {
-    if (text.starts_with('+'))
+    if (text.starts_with('+') && !text.starts_with("+-"))
         text.remove_prefix(1);
     double number = 0;
     if (!readsWhole(text, number))

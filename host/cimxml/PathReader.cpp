@@ -143,19 +143,23 @@ ObjectPath& PathReader::target(
     std::string host;
     std::string ownNameSpace;
     const Element* name = nullptr;
-    for (const Element& part :
-        found.children({"NAMESPACEPATH", "LOCALNAMESPACEPATH", "INSTANCENAME", "CLASSNAME"})) {
+    const auto& parts =
+        found.children({"NAMESPACEPATH", "LOCALNAMESPACEPATH", "INSTANCENAME", "CLASSNAME"});
+    for (const Element& part : parts) {
         if (part.is("NAMESPACEPATH")) {
-            for (const Element& inner : part.children({"HOST", "LOCALNAMESPACEPATH"}))
-                (inner.is("HOST") ? host : ownNameSpace) =
-                    inner.is("HOST") ? inner.content() : nameSpaceOf(inner);
+            for (const Element& inner : part.children({"HOST", "LOCALNAMESPACEPATH"})) {
+                std::string& value = inner.is("HOST") ? host : ownNameSpace;
+                if (!value.empty())
+                    part.fail("it needs one host and one namespace");
+                value = inner.is("HOST") ? inner.content() : nameSpaceOf(inner);
+            }
         } else if (part.is("LOCALNAMESPACEPATH")) {
             ownNameSpace = nameSpaceOf(part);
         } else {
             name = &part;
         }
     }
-    if (name == nullptr || ownNameSpace.empty())
+    if (parts.size() != 2 || name == nullptr || ownNameSpace.empty())
         found.fail("it needs a namespace and a name");
     ObjectPath& path = named(*name, ownNameSpace);
     if (!host.empty())

@@ -127,8 +127,14 @@ TEST_F(PathTest, ReadsReferencesInAllTheirForms)
                     "</NAMESPACEPATH>" + thing() + "</INSTANCEPATH>"),
         "//h:5988/" + plain);
     EXPECT_EQ(owner("<CLASSNAME NAME='THING'/>"), "root/test:Thing");
-    EXPECT_THAT(pathRefusal(link("<INSTANCEPATH>" + thing() + "</INSTANCEPATH>")),
-        testing::StartsWith("request-not-loosely-valid "));
+    const std::string host = "<HOST>h</HOST>";
+    const std::string path = "<NAMESPACEPATH>" + host + local + "</NAMESPACEPATH>";
+    for (const std::string& content : {thing(), path + thing() + thing(), path + path + thing(),
+             "<NAMESPACEPATH>" + host + host + local + "</NAMESPACEPATH>" + thing(),
+             "<NAMESPACEPATH>" + host + local + local + "</NAMESPACEPATH>" + thing()})
+        EXPECT_THAT(pathRefusal(link("<INSTANCEPATH>" + content + "</INSTANCEPATH>")),
+            testing::StartsWith("request-not-loosely-valid "))
+            << content;
 }
 
 TEST_F(PathTest, BoundsHowDeepPathsStandInOneAnother)
@@ -156,6 +162,8 @@ TEST_F(PathTest, GoesByTheKeyItselfWhereTheClassIsNotKnown)
     EXPECT_EQ(otherKey("VALUETYPE='numeric'", "1.5").real(), 1.5);
     EXPECT_EQ(otherKey("TYPE='uint8' VALUETYPE='numeric'", "5").type(), CMPI_uint8);
     EXPECT_EQ(pathRefusal(keyOf("VALUETYPE='numeric'", "x")), "4 key \"K\": \"x\" is no number");
+    EXPECT_EQ(
+        pathRefusal(keyOf("VALUETYPE='numeric'", "+-1.5")), "4 key \"K\": \"+-1.5\" is no number");
     EXPECT_EQ(pathRefusal(keyOf("VALUETYPE='x'", "x")), "4 key \"K\": \"x\" is no VALUETYPE");
     EXPECT_EQ(pathRefusal(keyOf("TYPE='x'", "x")), "4 key \"K\": \"x\" is no type of a value");
 }
