@@ -13,10 +13,19 @@ namespace Host::Http {
 
 namespace {
 
-// Returns the text up to the separator, without white space, and removes both.
+// Returns the text up to the first separator outside of quoted strings, without white space, and
+// removes both.
 std::string_view takeUntil(char separator, std::string_view& text)
 {
-    const std::string_view part = text.substr(0, text.find(separator));
+    bool isQuoted = false;
+    std::size_t size = 0;
+    for (; size < text.size() && (isQuoted || text[size] != separator); ++size) {
+        if (text[size] == '"')
+            isQuoted = !isQuoted;
+        else if (isQuoted && text[size] == '\\')
+            ++size; // RFC 9110, 5.6.4: what follows is part of the string
+    }
+    const std::string_view part = text.substr(0, size);
     text.remove_prefix(std::min(part.size() + 1, text.size()));
     return Text::trimmed(part, " \t");
 }

@@ -101,8 +101,9 @@ TEST(HeaderCheckTest, KnowsTwoPathsAndTwoMethods)
 TEST(HeaderCheckTest, TakesNothingButXmlInUtf8)
 {
     for (const std::string type : {"text/xml", "TEXT/XML", "application/xml;charset=UTF-8",
-             "application/xml ; q=1 ; charset = utf-8", "text/xml;", "text/xml; charset=\"utf-8\"",
-             "text/xml; version=2.0"})
+             "application/xml ; q=1 ; charset = utf-8",
+             R"(text/xml; q="\";charset=x"; charset=utf-8)", "text/xml;",
+             "text/xml; charset=\"utf-8\"", "text/xml; version=2.0"})
         EXPECT_EQ(verdict(with({"Content-Type", type})), "ok") << type;
     for (const std::string type : {"", "text/plain", "text/xml charset=utf-8", "application/json",
              "text/xml; charset=iso-8859-1", "text/xml; charset=", "text/xml; charset=\"utf-8",
