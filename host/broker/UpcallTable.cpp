@@ -37,6 +37,7 @@ Enumeration& enumerateInstances(const Broker& broker, const CMPIContext* context
 } // namespace
 
 const CMPIBrokerFT upcallFunctions = {
+    // The least that can be said, although getInstance is not offered.
     .brokerCapabilities = CMPI_MB_BasicRead,
     .brokerVersion = CMPIVersion200,
     .brokerName = "sensor-profile",

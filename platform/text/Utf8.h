@@ -30,7 +30,7 @@ void appendUtf8(std::string& out, char32_t code);
 std::string toValidUtf8(std::string_view text);
 
 // Returns the beginning of the text in at most that many bytes, without part of a character at its
-// end. REQUIRES: valid UTF-8.
+// end. It may be shorter still where the text is not valid UTF-8.
 std::string_view cutAtCharacter(std::string_view text, std::size_t maximumBytes);
 
 } // namespace Text
