@@ -5,6 +5,7 @@
 #include "host/http/Address.h"
 #include "host/http/EventLog.h"
 
+#include <poll.h>
 #include <sys/socket.h>
 
 #include <algorithm>
@@ -16,7 +17,6 @@ namespace Host::Http {
 namespace {
 
 constexpr std::chrono::milliseconds watchInterval{500};
-constexpr std::chrono::seconds complaintInterval{60};
 constexpr std::chrono::seconds requestTimeoutInShutdown{2};
 
 // Returns whether the client has closed its direction and all that it sent was read.
@@ -24,6 +24,14 @@ bool hasClientFinished(int descriptor)
 {
     char next = 0;
     return ::recv(descriptor, &next, 1, MSG_PEEK | MSG_DONTWAIT) == 0;
+}
+
+// Returns whether the client has closed the connection or its direction, even where some of what it
+// sent was not read.
+bool hasClientClosed(int descriptor)
+{
+    ::pollfd state{descriptor, POLLRDHUP, 0};
+    return ::poll(&state, 1, 0) == 1;
 }
 
 } // namespace
@@ -36,9 +44,12 @@ Connections::Connections(const Limits& limits)
 ClientConnection* Connections::add(
     int descriptor, const Address& client, std::shared_ptr<const Certificate> certificate)
 {
-    const std::lock_guard lock(mutex_);
-    if (!hasRoomFor(client)) {
+    std::unique_lock lock(mutex_);
+    if (const auto refusal = refusalOf(client)) {
         ::shutdown(descriptor, SHUT_RDWR);
+        lock.unlock();
+        if (refusals_.allowsReport())
+            report({"add", "Connections", __LINE__}, *refusal);
         return nullptr;
     }
     ClientConnection& connection = all_.emplace_back(descriptor, client, std::move(certificate));
@@ -51,7 +62,7 @@ ClientConnection* Connections::add(
     return &connection;
 }
 
-bool Connections::hasRoomFor(const Address& client)
+std::optional<std::string> Connections::refusalOf(const Address& client) const
 {
     const bool areTooMany = all_.size() >= limits_.maximumConnections;
     const auto ofNetwork = std::count_if(
@@ -59,16 +70,9 @@ bool Connections::hasRoomFor(const Address& client)
             return each.network == network;
         });
     if (!areTooMany && static_cast<std::size_t>(ofNetwork) < limits_.maximumConnectionsPerAddress)
-        return true;
-    const auto now = Clock::now();
-    if (!lastComplaint_ || now - *lastComplaint_ >= complaintInterval) {
-        lastComplaint_ = now;
-        report({"hasRoomFor", "Connections", __LINE__},
-            "refused a connection from " + client.host() + ": there are " +
-                std::to_string(all_.size()) +
-                (areTooMany ? "" : ", too many of them from this address"));
-    }
-    return false;
+        return std::nullopt;
+    return "refused a connection from " + client.host() + ": there are " +
+           std::to_string(all_.size()) + (areTooMany ? "" : ", too many of them from this address");
 }
 
 void Connections::remove(ClientConnection& connection)
@@ -128,10 +132,14 @@ bool Connections::isShuttingDown() const
     return isShuttingDown_;
 }
 
-bool Connections::waitUntil(Clock::time_point time)
+bool Connections::waitUntil(ClientConnection& connection, Clock::time_point time)
 {
     std::unique_lock lock(mutex_);
-    return !changed_.wait_until(lock, time, [this] { return isShuttingDown_; });
+    connection.phase = Phase::waiting;
+    const bool isInterrupted = changed_.wait_until(
+        lock, time, [&] { return isShuttingDown_ || connection.phase != Phase::waiting; });
+    connection.phase = Phase::working;
+    return !isInterrupted;
 }
 
 bool Connections::waitUntilIdle(std::chrono::milliseconds timeout)
@@ -145,19 +153,25 @@ void Connections::watch(const std::stop_token& stop)
     std::unique_lock lock(mutex_);
     while (changed_.wait(lock, stop, [this] { return !all_.empty(); }) && !stop.stop_requested()) {
         changed_.wait_for(lock, stop, watchInterval, [] { return false; });
-        try {
-            closeOverdue();
-        } catch (const std::bad_alloc&) {
-            continue; // the next round closes the others
-        }
+        const auto lines = closeOverdue();
+        lock.unlock();
+        for (const std::string& line : lines)
+            reportDetail({"watch", "Connections", __LINE__}, line);
+        lock.lock();
     }
 }
 
-void Connections::closeOverdue()
+std::vector<std::string> Connections::closeOverdue()
 {
+    std::vector<std::string> lines;
     const auto now = Clock::now();
-    for (const ClientConnection& connection : all_) {
-        if (connection.phase == Phase::working)
+    for (ClientConnection& connection : all_) {
+        if (connection.phase == Phase::waiting && hasClientClosed(connection.descriptor)) {
+            ::shutdown(connection.descriptor, SHUT_RDWR);
+            connection.phase = Phase::working;
+            changed_.notify_all();
+        }
+        if (connection.phase == Phase::working || connection.phase == Phase::waiting)
             continue;
         // libmicrohttpd overlooks an end that arrives together with the last bytes.
         if (connection.phase != Phase::answering && hasClientFinished(connection.descriptor))
@@ -165,9 +179,14 @@ void Connections::closeOverdue()
         if (now < connection.deadline)
             continue;
         ::shutdown(connection.descriptor, SHUT_RDWR);
-        reportDetail({"closeOverdue", "Connections", __LINE__},
-            "a client at " + connection.address + " is too slow");
+        try {
+            if (areDetailsLogged())
+                lines.push_back("a client at " + connection.address + " is too slow");
+        } catch (const std::bad_alloc&) {
+            continue; // the line is lost, and the others are closed nevertheless
+        }
     }
+    return lines;
 }
 
 } // namespace Host::Http

@@ -6,6 +6,7 @@
 #include "host/http/Certificate.h"
 #include "host/http/Exchange.h"
 #include "host/http/Limits.h"
+#include "host/http/ReportInterval.h"
 
 #include <chrono>
 #include <condition_variable>
@@ -17,6 +18,7 @@
 #include <string>
 #include <thread>
 #include <utility>
+#include <vector>
 
 namespace Host::Http {
 
@@ -24,6 +26,7 @@ enum class Phase {
     idle,      // between requests
     receiving, // a request arrives
     working,   // the server works on it: no timeout counts
+    waiting,   // its sign-in waits (see waitUntil): ends where the client closes the connection
     answering, // the client fetches the answer
 };
 
@@ -39,7 +42,7 @@ struct ClientConnection {
     const int descriptor;
     const std::string address;                            // for the log
     const std::string network;                            // for the limits of an address
-    const std::shared_ptr<const Certificate> certificate; // null without TLS
+    const std::shared_ptr<const Certificate> certificate; // null for a server without TLS
 
     // Guarded by the mutex of Connections.
     Phase phase = Phase::idle;
@@ -74,9 +77,9 @@ public:
     // the others after their answer, or soon when their request does not arrive. Idempotent.
     void beginShutdown();
     bool isShuttingDown() const;
-    // Blocks until then, but no longer than until the shutdown begins. Returns whether the time was
-    // reached.
-    bool waitUntil(Clock::time_point time);
+    // Blocks until then, but no longer than until the shutdown begins or the client closes the
+    // connection. Returns whether the time was reached. REQUIRES: the phase is `working`.
+    bool waitUntil(ClientConnection& connection, Clock::time_point time);
     // Blocks until no request is in progress, at most for the timeout. Returns whether that was
     // reached.
     bool waitUntilIdle(std::chrono::milliseconds timeout);
@@ -84,19 +87,22 @@ public:
 private:
     void watch(const std::stop_token& stop);
 
-    // REQUIRES: the mutex is held.
-    void closeOverdue();
+    // REQUIRES: the mutex is held. No line is written to the log meanwhile, which may be slow: each
+    // function returns what is to be logged.
+    std::vector<std::string> closeOverdue();
     std::chrono::seconds timeoutOf(Phase phase) const;
-    bool hasRoomFor(const Address& client);
+    // Returns why the client exceeds a limit; nothing when it does not.
+    std::optional<std::string> refusalOf(const Address& client) const;
 
     const Limits& limits_;
     mutable std::mutex mutex_;
-    // A first connection, the end of the last request in progress, the beginning of the shutdown.
+    // A first connection, the end of the last request in progress, the end of a wait, the beginning
+    // of the shutdown.
     std::condition_variable_any changed_;
     std::list<ClientConnection> all_;
     std::size_t busy_ = 0; // connections that are not idle
     bool isShuttingDown_ = false;
-    std::optional<Clock::time_point> lastComplaint_;
+    ReportInterval refusals_;
     std::jthread watcher_; // last: it uses all of the above
 };
 

@@ -15,6 +15,7 @@
 #include <cstddef>
 #include <cstdint>
 #include <cstdio>
+#include <exception>
 #include <memory>
 #include <new>
 #include <stdexcept>
@@ -54,27 +55,39 @@ ClientConnection* clientOf(MHD_Connection* connection)
     return info == nullptr ? nullptr : static_cast<ClientConnection*>(info->socket_context);
 }
 
-// Returns null without TLS. A connection keeps the certificate that it began with.
-std::shared_ptr<const Certificate> showCertificate(Service& service, MHD_Connection* connection)
+int descriptorOf(MHD_Connection* connection)
 {
-    const auto* const info =
-        ::MHD_get_connection_info(connection, MHD_CONNECTION_INFO_GNUTLS_SESSION);
-    if (info == nullptr || info->tls_session == nullptr)
-        return nullptr;
-    auto certificate = service.certificate.get();
-    ::gnutls_credentials_set(static_cast<gnutls_session_t>(info->tls_session),
-        GNUTLS_CRD_CERTIFICATE, certificate->handle());
-    return certificate;
+    return ::MHD_get_connection_info(connection, MHD_CONNECTION_INFO_CONNECTION_FD)->connect_fd;
 }
 
+// Returns null for a connection that exceeds a limit. Its TLS session keeps the credentials of the
+// library, since it may still read what the client sent, and nothing would own a certificate.
 ClientConnection* connected(Service& service, MHD_Connection* connection)
 {
-    const auto* const descriptor =
-        ::MHD_get_connection_info(connection, MHD_CONNECTION_INFO_CONNECTION_FD);
     const auto* const address =
         ::MHD_get_connection_info(connection, MHD_CONNECTION_INFO_CLIENT_ADDRESS);
-    return service.connections.add(descriptor->connect_fd, Address(address->client_addr),
-        showCertificate(service, connection));
+    ClientConnection* const client = service.connections.add(
+        descriptorOf(connection), Address(address->client_addr), service.certificate.get());
+    const auto* const tls =
+        ::MHD_get_connection_info(connection, MHD_CONNECTION_INFO_GNUTLS_SESSION);
+    if (client != nullptr && tls != nullptr && tls->tls_session != nullptr)
+        ::gnutls_credentials_set(static_cast<gnutls_session_t>(tls->tls_session),
+            GNUTLS_CRD_CERTIFICATE, client->certificate->handle());
+    return client;
+}
+
+// Reports the exception that is being handled.
+void reportFailure(const Place& place) noexcept
+{
+    try {
+        throw;
+    } catch (const std::bad_alloc&) {
+        report(place, "no memory for a request");
+    } catch (const std::exception& error) {
+        report(place, error.what());
+    } catch (...) {
+        report(place, "a request failed");
+    }
 }
 
 MHD_Result addField(void* head, MHD_ValueKind, const char* name, std::size_t nameSize,
@@ -114,7 +127,8 @@ void connectionChanged(void* service, MHD_Connection* connection, void** client,
         try {
             *client = connected(serviceOf(service), connection);
         } catch (...) {
-            *client = nullptr; // its requests are not answered
+            *client = nullptr;
+            ::shutdown(descriptorOf(connection), SHUT_RDWR);
         }
     } else if (*client != nullptr) {
         auto& ended = *static_cast<ClientConnection*>(*client);
@@ -140,7 +154,7 @@ void* requestBegins(void* service, const char* uri, MHD_Connection* connection) 
         reportDetail({"requestBegins", "Daemon", __LINE__},
             "a request from " + client->address + " has too many arguments");
     } catch (...) {
-        report({"requestBegins", "Daemon", __LINE__}, "no memory for a request");
+        reportFailure({"requestBegins", "Daemon", __LINE__});
     }
     ::shutdown(client->descriptor, SHUT_RDWR);
     return nullptr;
@@ -163,7 +177,7 @@ MHD_Result requestGoesOn(void* service, MHD_Connection* connection, const char*,
         *size = 0;
         return client->exchange->proceed(bytes) ? MHD_YES : MHD_NO;
     } catch (...) {
-        report({"requestGoesOn", "Daemon", __LINE__}, "no memory for a request");
+        reportFailure({"requestGoesOn", "Daemon", __LINE__});
         return MHD_NO;
     }
 }
@@ -176,20 +190,6 @@ void requestEnded(
         return;
     client->exchange.reset();
     serviceOf(service).connections.enter(*client, Phase::idle);
-}
-
-void logLine(void*, const char* format, std::va_list arguments) noexcept
-{
-    std::array<char, 512> text{};
-    std::vsnprintf(text.data(), text.size(), format, arguments);
-    std::string_view line = text.data();
-    while (line.ends_with('\n'))
-        line.remove_suffix(1);
-    try {
-        reportDetail({"logLine", "Daemon", __LINE__}, std::string(line));
-    } catch (...) {
-        return; // the line is lost
-    }
 }
 
 unsigned flagsFor(const ListeningSocket& socket)
@@ -223,13 +223,25 @@ Daemon::~Daemon()
     service_.connections.beginShutdown(); // or a thread would sleep until its sign-in is refused
 }
 
+void Daemon::logLine(void* daemon, const char* format, std::va_list arguments) noexcept
+{
+    std::array<char, 512> text{};
+    std::vsnprintf(text.data(), text.size(), format, arguments);
+    std::string_view line = text.data();
+    while (line.ends_with('\n'))
+        line.remove_suffix(1);
+    auto& self = *static_cast<Daemon*>(daemon);
+    const bool isReported = !self.isStarted_ || self.lines_.allowsReport();
+    (isReported ? report : reportDetail)({"logLine", "Daemon", __LINE__}, line);
+}
+
 void Daemon::start(const Certificate* certificate)
 {
     const auto number = [](std::size_t value) { return static_cast<std::intptr_t>(value); };
     const Limits& limits = service_.limits;
     std::vector<MHD_OptionItem> options{
         // First, since the library logs from then on.
-        {MHD_OPTION_EXTERNAL_LOGGER, reinterpret_cast<std::intptr_t>(&logLine), nullptr},
+        {MHD_OPTION_EXTERNAL_LOGGER, reinterpret_cast<std::intptr_t>(&logLine), this},
         {MHD_OPTION_LISTEN_SOCKET, socket_.descriptor(), nullptr},
         {MHD_OPTION_CONNECTION_MEMORY_LIMIT, number(limits.maximumHeader + memoryBesideHead),
             nullptr},
@@ -256,6 +268,7 @@ void Daemon::start(const Certificate* certificate)
     if (!daemon_)
         throw std::runtime_error("cannot serve " + socket_.address().text() +
                                  ": the HTTP library did not start, the log may tell why");
+    isStarted_ = true;
 }
 
 void Daemon::stopAccepting()

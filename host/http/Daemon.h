@@ -3,7 +3,10 @@
 #pragma once
 
 #include "host/http/ListeningSocket.h"
+#include "host/http/ReportInterval.h"
 
+#include <atomic>
+#include <cstdarg>
 #include <memory>
 
 struct MHD_Daemon;
@@ -35,9 +38,14 @@ private:
     };
 
     void start(const Certificate* certificate);
+    // Logs a line of the library: each while it starts, then one a minute, and the others as
+    // details, since clients cause some of them.
+    static void logLine(void* daemon, const char* format, std::va_list arguments) noexcept;
 
     Service& service_;
     ListeningSocket socket_;
+    std::atomic<bool> isStarted_ = false;
+    ReportInterval lines_;
     std::unique_ptr<MHD_Daemon, Stopping> daemon_;
     bool isAccepting_ = true;
 };

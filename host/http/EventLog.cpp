@@ -65,7 +65,7 @@ std::string legible(std::string_view text)
     return line;
 }
 
-void writeLine(const Place& place, int level, const std::string& text) noexcept
+void writeLine(const Place& place, int level, std::string_view text) noexcept
 {
     try {
         RynLog::RynLogger::logLevelMessage(
@@ -77,12 +77,12 @@ void writeLine(const Place& place, int level, const std::string& text) noexcept
 
 } // namespace
 
-void report(const Place& place, const std::string& text) noexcept
+void report(const Place& place, std::string_view text) noexcept
 {
     writeLine(place, levelOfMessages, text);
 }
 
-void reportDetail(const Place& place, const std::string& text) noexcept
+void reportDetail(const Place& place, std::string_view text) noexcept
 {
     if (areDetailsLogged())
         writeLine(place, levelOfDetails, text);

@@ -7,6 +7,7 @@
 #pragma once
 
 #include <string>
+#include <string_view>
 
 namespace Host::Http {
 
@@ -17,10 +18,10 @@ struct Place {
 };
 
 // Writes a message for the administrator.
-void report(const Place& place, const std::string& text) noexcept;
+void report(const Place& place, std::string_view text) noexcept;
 
 // Writes a detail about a single client or request. By default, the log level suppresses details.
-void reportDetail(const Place& place, const std::string& text) noexcept;
+void reportDetail(const Place& place, std::string_view text) noexcept;
 // Returns whether details are written at the current log level.
 bool areDetailsLogged() noexcept;
 

@@ -28,9 +28,11 @@ HttpError unauthorized()
 }
 
 // RFC 9110, 15.6.4.
-HttpError unavailable(const std::string& reason)
+HttpError unavailable(
+    const std::string& reason, std::chrono::seconds retryAfter = std::chrono::seconds(1))
 {
-    return {MHD_HTTP_SERVICE_UNAVAILABLE, reason, {}, {{"Retry-After", "1"}}};
+    return {MHD_HTTP_SERVICE_UNAVAILABLE, reason, {},
+        {{"Retry-After", std::to_string(retryAfter.count())}}};
 }
 
 WorkSlots::Slot takeSlot(WorkSlots& slots)
@@ -80,6 +82,7 @@ void Exchange::signIn(const RequestHead& head)
 bool Exchange::isPasswordRight(const Credentials& credentials)
 {
     SignIns& signIns = service_.signIns;
+    const auto latest = std::chrono::steady_clock::now() + service_.limits.requestTimeout;
     for (;;) {
         auto slot = takeSlot(service_.work);
         const auto now = std::chrono::steady_clock::now();
@@ -89,12 +92,16 @@ bool Exchange::isPasswordRight(const Credentials& credentials)
                 signIns.tryPassword(credentials, client_.address, client_.network, now);
             slot.reset();
             if (refusal)
-                service_.connections.waitUntil(*refusal);
+                service_.connections.waitUntil(client_, *refusal);
             return !refusal;
         }
         slot.reset();
-        if (!service_.connections.waitUntil(admission))
-            throw unavailable("the server is ending");
+        if (admission > latest)
+            throw unavailable("too many sign-ins have failed",
+                std::chrono::ceil<std::chrono::seconds>(admission - now));
+        if (!service_.connections.waitUntil(client_, admission))
+            throw unavailable(service_.connections.isShuttingDown() ? "the server is ending"
+                                                                    : "the client is gone");
     }
 }
 

@@ -52,6 +52,21 @@ protected:
     }
 };
 
+TEST_F(LimitsTest, LinesOfTheHttpLibraryAreReportedOnceAMinute)
+{
+    start();
+    const Testing::LogCapture log(4000);
+    for (int i = 0; i < 2; ++i)
+        EXPECT_EQ(ask(announced("none")).status, 400);
+    std::vector<int> levels;
+    for (const Testing::LogLine& line : log.log())
+        if (line.function == "logLine")
+            levels.push_back(line.level);
+    ASSERT_GT(levels.size(), 1U);
+    EXPECT_EQ(levels.front(), 6000);
+    EXPECT_THAT(std::vector(levels.begin() + 1, levels.end()), testing::Each(4000));
+}
+
 TEST_F(LimitsTest, BodyBeyondTheLimitIsReadAndRefused)
 {
     limits.maximumBody = 1000;

@@ -34,6 +34,13 @@ protected:
         return "Authorization: Basic " + credentials + "\r\n";
     }
 
+    void startWithLongWaits()
+    {
+        limits.signInDelay = 3600s;
+        limits.requestTimeout = 7200s;
+        start();
+    }
+
     // Two clients with a wrong password each.
     void guessTwiceAtATime()
     {
@@ -221,10 +228,41 @@ TEST_F(SignInTest, NewPasswordsCountAtOnce)
     EXPECT_EQ(ask(post(as("Ym9iOnNlY3JldA=="))).status, 200);
 }
 
+TEST_F(SignInTest, WhoWaitsTooLongIsToldWhenToComeAgain)
+{
+    limits.signInDelay = 60s;
+    start();
+    HttpClient guesser = connect();
+    guesser.send(post(wrong));
+    EXPECT_FALSE(guesser.hasReplyWithin(300ms));
+    const HttpReply reply = ask(post(right));
+    EXPECT_EQ(reply.status, 503);
+    EXPECT_EQ(reply.body, "too many sign-ins have failed\n");
+    EXPECT_GT(std::stoi(reply.field("retry-after")), 30);
+    EXPECT_LE(std::stoi(reply.field("retry-after")), 60);
+}
+
+TEST_F(SignInTest, ClientsThatLeaveAreNotWaitedFor)
+{
+    startWithLongWaits();
+    {
+        HttpClient guesser = connect();
+        guesser.send(post(wrong));
+        EXPECT_FALSE(guesser.hasReplyWithin(300ms));
+        HttpClient resetting = connect();
+        resetting.send(post(wrong));
+        HttpClient leaving = connect();
+        leaving.send(post(wrong) + std::string(100'000, 'x')); // more than the server reads
+        EXPECT_FALSE(leaving.hasReplyWithin(300ms));
+        EXPECT_FALSE(server->waitUntilIdle(0ms));
+        resetting.closeHard();
+    }
+    EXPECT_TRUE(server->waitUntilIdle(8s));
+}
+
 TEST_F(SignInTest, ServerThatStopsDoesNotWaitForThoseWhoGuess)
 {
-    limits.signInDelay = 3600s;
-    start();
+    startWithLongWaits();
     HttpClient guesser = connect();
     guesser.send(post(wrong));
     EXPECT_FALSE(guesser.hasReplyWithin(300ms));
@@ -241,8 +279,7 @@ TEST_F(SignInTest, ServerThatStopsDoesNotWaitForThoseWhoGuess)
 
 TEST_F(SignInTest, ServerEndsWhileSomebodyWaitsForARefusal)
 {
-    limits.signInDelay = 3600s;
-    start();
+    startWithLongWaits();
     HttpClient client = connect();
     client.send(post(wrong));
     HttpClient next = connect();

@@ -139,6 +139,29 @@ TEST_F(TlsTest, ClientsThatAreTooManyEndBeforeTheHandshake)
     }
 }
 
+TEST_F(TlsTest, RefusedClientsMayComeWhileCertificatesAreReplaced)
+{
+    server.reset();
+    limits.maximumConnections = 1;
+    start({{{"127.0.0.1", 0}, true}});
+    certificate.reset(); // a replaced one is freed where no connection keeps it
+    TlsClient client(port);
+    std::jthread replacing([&](const std::stop_token& stop) {
+        while (!stop.stop_requested())
+            server->replaceCertificate(Certificate::read(file("one.crt"), file("one.key")));
+    });
+    // Several at once, so that the server accepts some whose handshake has already arrived.
+    std::vector<std::jthread> clients;
+    for (int i = 0; i < 8; ++i)
+        clients.emplace_back([this] {
+            for (int n = 0; n < 200; ++n)
+                EXPECT_THROW(TlsClient{port}, std::runtime_error);
+        });
+    clients.clear();
+    client.send(post());
+    EXPECT_EQ(client.receive().status, 200);
+}
+
 // Who writes to them would raise a SIGPIPE, which ends a process that does not care for it.
 TEST_F(TlsTest, ClientsThatVanishAmidTheirAnswerDoNoHarm)
 {
