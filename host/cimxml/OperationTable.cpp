@@ -15,24 +15,24 @@ using P = Parameter;
 using Set = ParameterSet;
 
 constexpr Set nothing;
-constexpr Set association(P::assocClass, P::resultClass, P::role, P::resultRole);
-constexpr Set reference(P::resultClass, P::role);
-constexpr Set look(P::includeQualifiers, P::includeClassOrigin, P::propertyList);
+constexpr Set associationFilters(P::assocClass, P::resultClass, P::role, P::resultRole);
+constexpr Set referenceFilters(P::resultClass, P::role);
+constexpr Set content(P::includeQualifiers, P::includeClassOrigin, P::propertyList);
 constexpr Set opening(P::filterQuery, P::filterQueryLanguage, P::operationTimeout,
     P::continueOnError, P::maxObjectCount);
 constexpr Set openingInstances = opening | Set(P::includeClassOrigin, P::propertyList);
 
 constexpr std::array<OperationForm, 22> forms = {{
-    {Kind::getInstance, "GetInstance", {P::instanceName}, look | P::localOnly, {P::localOnly}},
+    {Kind::getInstance, "GetInstance", {P::instanceName}, content | P::localOnly, {P::localOnly}},
     {Kind::enumerateInstances, "EnumerateInstances", {P::className},
-        look | Set(P::localOnly, P::deepInheritance), {P::localOnly, P::deepInheritance}},
+        content | Set(P::localOnly, P::deepInheritance), {P::localOnly, P::deepInheritance}},
     {Kind::enumerateInstanceNames, "EnumerateInstanceNames", {P::className}, nothing, nothing},
     {Kind::getProperty, "GetProperty", {P::instanceName, P::propertyName}, nothing, nothing},
-    {Kind::associators, "Associators", {P::objectName}, association | look, nothing},
-    {Kind::associatorNames, "AssociatorNames", {P::objectName}, association, nothing},
-    {Kind::references, "References", {P::objectName}, reference | look, nothing},
-    {Kind::referenceNames, "ReferenceNames", {P::objectName}, reference, nothing},
-    {Kind::getClass, "GetClass", {P::className}, look | P::localOnly,
+    {Kind::associators, "Associators", {P::objectName}, associationFilters | content, nothing},
+    {Kind::associatorNames, "AssociatorNames", {P::objectName}, associationFilters, nothing},
+    {Kind::references, "References", {P::objectName}, referenceFilters | content, nothing},
+    {Kind::referenceNames, "ReferenceNames", {P::objectName}, referenceFilters, nothing},
+    {Kind::getClass, "GetClass", {P::className}, content | P::localOnly,
         {P::localOnly, P::includeQualifiers}},
     {Kind::enumerateClasses, "EnumerateClasses", nothing,
         {P::className, P::deepInheritance, P::localOnly, P::includeQualifiers,
@@ -47,13 +47,13 @@ constexpr std::array<OperationForm, 22> forms = {{
     {Kind::openEnumerateInstancePaths, "OpenEnumerateInstancePaths", {P::className}, opening,
         nothing},
     {Kind::openAssociatorInstances, "OpenAssociatorInstances", {P::instanceName},
-        openingInstances | association, nothing},
+        openingInstances | associationFilters, nothing},
     {Kind::openAssociatorInstancePaths, "OpenAssociatorInstancePaths", {P::instanceName},
-        opening | association, nothing},
+        opening | associationFilters, nothing},
     {Kind::openReferenceInstances, "OpenReferenceInstances", {P::instanceName},
-        openingInstances | reference, nothing},
+        openingInstances | referenceFilters, nothing},
     {Kind::openReferenceInstancePaths, "OpenReferenceInstancePaths", {P::instanceName},
-        opening | reference, nothing},
+        opening | referenceFilters, nothing},
     {Kind::pullInstancesWithPath, "PullInstancesWithPath",
         {P::enumerationContext, P::maxObjectCount}, nothing, nothing},
     {Kind::pullInstancePaths, "PullInstancePaths", {P::enumerationContext, P::maxObjectCount},
