@@ -31,7 +31,9 @@ const char* nameSpaceOf(const CMPIObjectPath* ref)
     return isUsable(nameSpace) ? nameSpace->ft->getCharPtr(nameSpace, nullptr) : nullptr;
 }
 
-// Any call of the broker may return an unusable object: each is tested before each use.
+// Any call of the broker may return an unusable object: each is tested before each use. An object
+// manager may copy a whole CMPIValue from the address it is passed, whatever the type: all but
+// texts are such values.
 
 bool addKey(const CMPIObjectPath* path, const char* name, const char* text)
 {
@@ -45,26 +47,28 @@ bool setText(const CMPIInstance* instance, const char* name, const char* text)
 
 void setCode(const CMPIInstance* instance, const char* name, std::uint16_t code)
 {
+    const CMPIValue value = {.uint16 = code};
     if (isUsable(instance))
-        CMSetProperty(instance, name, &code, CMPI_uint16);
+        CMSetProperty(instance, name, &value, CMPI_uint16);
 }
 
 // Sets an array of one element; the property is left out when the broker fails to make the array.
 void setList(const CMPIBroker* broker, const CMPIInstance* instance, const char* name,
-    const void* element, CMPIType type)
+    const CMPIValue& element, CMPIType type)
 {
     CMPIArray* const array = CMNewArray(broker, 1, type, nullptr);
     if (!isUsable(array))
         return;
-    const CMPIStatus set = CMSetArrayElementAt(array, 0, element, type);
+    const CMPIStatus set = CMSetArrayElementAt(array, 0, &element, type);
+    const CMPIValue value = {.array = array};
     if (set.rc == CMPI_RC_OK && isUsable(array) && isUsable(instance))
-        CMSetProperty(instance, name, &array, static_cast<CMPIType>(type | CMPI_ARRAY));
+        CMSetProperty(instance, name, &value, static_cast<CMPIType>(type | CMPI_ARRAY));
 }
 
 void setCodes(
     const CMPIBroker* broker, const CMPIInstance* instance, const char* name, std::uint16_t code)
 {
-    setList(broker, instance, name, &code, CMPI_uint16);
+    setList(broker, instance, name, {.uint16 = code}, CMPI_uint16);
 }
 
 void setTexts(
@@ -72,7 +76,7 @@ void setTexts(
 {
     CMPIString* const string = CMNewString(broker, text, nullptr);
     if (isUsable(string))
-        setList(broker, instance, name, &string, CMPI_string);
+        setList(broker, instance, name, {.string = string}, CMPI_string);
 }
 
 void setIdentity(

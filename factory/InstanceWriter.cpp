@@ -15,17 +15,19 @@ void InstanceWriter::setText(const char* name, const std::string& text) const
 
 void InstanceWriter::setCode(const char* name, std::uint16_t code) const
 {
-    CMSetProperty(instance_, name, &code, CMPI_uint16);
+    const CMPIValue value = {.uint16 = code};
+    CMSetProperty(instance_, name, &value, CMPI_uint16);
 }
 
 void InstanceWriter::setNumber(const char* name, std::int32_t number) const
 {
-    CMSetProperty(instance_, name, &number, CMPI_sint32);
+    const CMPIValue value = {.sint32 = number};
+    CMSetProperty(instance_, name, &value, CMPI_sint32);
 }
 
 void InstanceWriter::setFlag(const char* name, bool flag) const
 {
-    const CMPIBoolean value = flag ? 1 : 0;
+    const CMPIValue value = {.boolean = flag};
     CMSetProperty(instance_, name, &value, CMPI_boolean);
 }
 
@@ -36,9 +38,12 @@ bool InstanceWriter::setCodes(
     CMPIArray* const array = CMNewArray(broker_, count, CMPI_uint16, rc);
     if (!isUsable(array))
         return false;
-    for (std::uint16_t i = 0; i < count; ++i)
-        CMSetArrayElementAt(array, i, &codes[i], CMPI_uint16);
-    CMSetProperty(instance_, name, &array, CMPI_uint16A);
+    for (std::uint16_t i = 0; i < count; ++i) {
+        const CMPIValue element = {.uint16 = codes[i]};
+        CMSetArrayElementAt(array, i, &element, CMPI_uint16);
+    }
+    const CMPIValue value = {.array = array};
+    CMSetProperty(instance_, name, &value, CMPI_uint16A);
     return true;
 }
 
@@ -50,11 +55,12 @@ bool InstanceWriter::setTexts(
     if (!isUsable(array))
         return false;
     for (std::uint16_t i = 0; i < count; ++i) {
-        CMPIString* const text = CMNewString(broker_, texts[i].c_str(), rc);
-        if (rc->rc == CMPI_RC_OK && isUsable(text))
-            CMSetArrayElementAt(array, i, &text, CMPI_string);
+        const CMPIValue element = {.string = CMNewString(broker_, texts[i].c_str(), rc)};
+        if (rc->rc == CMPI_RC_OK && isUsable(element.string))
+            CMSetArrayElementAt(array, i, &element, CMPI_string);
     }
-    CMSetProperty(instance_, name, &array, CMPI_stringA);
+    const CMPIValue value = {.array = array};
+    CMSetProperty(instance_, name, &value, CMPI_stringA);
     return true;
 }
 

@@ -11,8 +11,9 @@
 
 namespace Vorn::SensorProfileProvider {
 
-// Sets properties of one instance, each with its CMPI type. The status of a setting is ignored: a
-// property that the broker refuses is absent.
+// Sets properties of one instance, each with its CMPI type. An object manager may copy a whole
+// CMPIValue from the address it is passed, whatever the type: all but texts are such values. The
+// status of a setting is ignored: a property that the broker refuses is absent.
 class InstanceWriter {
 public:
     // REQUIRES: the instance is usable and outlives the writer.
