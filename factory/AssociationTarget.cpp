@@ -19,7 +19,7 @@ struct AssociationEnd {
     const char* associationClass;
     const char* targetClass;
     const char* provider;
-    const char* traceText; // names another class than the target; scripts match it
+    const char* traceText; // scripts match it; it may name another class than the target
     unsigned exitingLine;
 };
 
@@ -92,7 +92,7 @@ CMPIObjectPath* SensorFactory::get_assoc_targetClass_ObjectPath(const CMPIBroker
     traced.entering(FactoryLines::targetPath.entry);
     const char* const target =
         get_assoc_targetClass_Name(broker, ref, _RefLeftClass, _RefRightClass, rc);
-    CMPIObjectPath* const path = target ? newPath(broker, ref, target, rc) : nullptr;
+    CMPIObjectPath* const path = target ? newPath(broker, ref, target, rc, rc) : nullptr;
     traced.exiting(FactoryLines::targetPath.exit);
     return path;
 }

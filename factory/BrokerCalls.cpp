@@ -26,8 +26,8 @@ CMPIString* classNameOf(const CMPIObjectPath* path, CMPIStatus* rc)
     return isUsable(path) ? CMGetClassName(path, rc) : nullptr;
 }
 
-CMPIObjectPath* newPath(
-    const CMPIBroker* broker, const CMPIObjectPath* ref, const char* className, CMPIStatus* rc)
+CMPIObjectPath* newPath(const CMPIBroker* broker, const CMPIObjectPath* ref, const char* className,
+    CMPIStatus* rc, CMPIStatus* again)
 {
     const char* const nameSpace = nameSpaceOf(ref, rc);
     if (nameSpace == nullptr || broker == nullptr)
@@ -35,7 +35,7 @@ CMPIObjectPath* newPath(
     CMPIObjectPath* const path = CMNewObjectPath(broker, nameSpace, className, rc);
     if (!isUsable(path))
         return nullptr;
-    copyNameSpace(path, ref, rc);
+    copyNameSpace(path, ref, again);
     CMSetHostname(path, getSystemName().c_str());
     return path;
 }
@@ -46,9 +46,9 @@ void copyNameSpace(const CMPIObjectPath* path, const CMPIObjectPath* ref, CMPISt
         CMSetNameSpace(path, nameSpace);
 }
 
-bool isOfClass(const CMPIObjectPath* path, const char* className, CMPIStatus* rc)
+bool isOfClass(const CMPIObjectPath* path, const char* className)
 {
-    const char* const characters = charactersOf(classNameOf(path, rc), rc);
+    const char* const characters = charactersOf(classNameOf(path, nullptr), nullptr);
     return characters != nullptr && std::strcmp(characters, className) == 0;
 }
 

@@ -27,12 +27,12 @@ const char* nameSpaceOf(const CMPIObjectPath* path, CMPIStatus* rc);
 CMPIString* classNameOf(const CMPIObjectPath* path, CMPIStatus* rc);
 
 // Returns whether the class name of the path is exactly this one; case matters.
-bool isOfClass(const CMPIObjectPath* path, const char* className, CMPIStatus* rc);
+bool isOfClass(const CMPIObjectPath* path, const char* className);
 
 // Makes a path without keys, with the namespace of `ref`, the class, and this system as host.
-// Returns null when the broker fails.
-CMPIObjectPath* newPath(
-    const CMPIBroker* broker, const CMPIObjectPath* ref, const char* className, CMPIStatus* rc);
+// `again` is the status for setting the namespace once more. Returns null when the broker fails.
+CMPIObjectPath* newPath(const CMPIBroker* broker, const CMPIObjectPath* ref, const char* className,
+    CMPIStatus* rc, CMPIStatus* again = nullptr);
 
 // Sets the namespace of the path to that of `ref`, if there is one.
 void copyNameSpace(const CMPIObjectPath* path, const CMPIObjectPath* ref, CMPIStatus* rc);

@@ -9,7 +9,7 @@ namespace Vorn::SensorProfileProvider {
 namespace {
 
 void returnAssociation(ResultKind kind, const CMPIResult* rslt, const CMPIObjectPath* op,
-    const CMPIInstance* association, CMPIStatus* status)
+    const CMPIInstance* association)
 {
     if (kind == ResultKind::instances) {
         CMReturnInstance(rslt, association);
@@ -18,7 +18,7 @@ void returnAssociation(ResultKind kind, const CMPIResult* rslt, const CMPIObject
     const CMPIObjectPath* const path = CMGetObjectPath(association, nullptr);
     if (!isUsable(path))
         return;
-    copyNameSpace(path, op, status);
+    copyNameSpace(path, op, nullptr);
     CMReturnObjectPath(rslt, path);
 }
 
@@ -34,7 +34,7 @@ void AssociationRequest::failWithoutTarget(
 
 void AssociationRequest::returnReferences(ResultKind kind, const CMPIResult* rslt,
     const CMPIObjectPath* op, const CMPIObjectPath* path, bool leadsToSensors,
-    const std::vector<CMPIObjectPath*>& farEnds, CMPIStatus* status) const
+    const std::vector<CMPIObjectPath*>& farEnds) const
 {
     forEachCounted(farEnds, [&](const CMPIObjectPath* farEnd) {
         const References references =
@@ -42,7 +42,7 @@ void AssociationRequest::returnReferences(ResultKind kind, const CMPIResult* rsl
         const CMPIInstance* const association =
             newAssociation(broker_, path, references, nullptr, nullptr);
         if (isUsable(association))
-            returnAssociation(kind, rslt, op, association, status);
+            returnAssociation(kind, rslt, op, association);
     });
 }
 

@@ -20,12 +20,19 @@ namespace Vorn::SensorProfileProvider {
 // Whether a request returns objects or only their paths.
 enum class ResultKind { instances, paths };
 
-// One end of an association: the name of the reference property and its value.
+// One end of an association: the name of the reference property and its value, which is whole,
+// since an object manager may copy it without regard to its type.
 struct Reference {
     const char* role;
-    const CMPIObjectPath* path;
+    CMPIValue path;
 };
 using References = std::array<Reference, 2>;
+
+// A value has no place for a path that is const; the broker copies the path.
+inline Reference referenceTo(const char* role, const CMPIObjectPath* path)
+{
+    return {role, {.ref = const_cast<CMPIObjectPath*>(path)}};
+}
 
 // The properties of an association class that its requests depend on.
 struct AssociationClass {
@@ -92,7 +99,7 @@ public:
     {
         CMPIStatus status = {CMPI_RC_OK, nullptr};
         std::vector<CMPIInstance*> instances;
-        if (keyCountOf(op, &status) == 0)
+        if (keyCountOf(op, nullptr) == 0)
             fail({noKeyPassed, noKeyPassed, noKeyPassed}, &status, line);
         else if (build(instances) == 0)
             returnInstanceAt(rslt, op, instances, true, nullptr);
@@ -143,10 +150,10 @@ public:
         }
         if (const CMPIObjectPath* const path = newPath(broker_, op, served_.name, &status)) {
             // Evaluated once, since a different answer later would swap the ends of the pairs.
-            const bool leadsToSensors = isOfClass(target, SensorClass, &status);
+            const bool leadsToSensors = isOfClass(target, SensorClass);
             const FetchFailure failure = fetch(factory, target, leadsToSensors, farEnds, &status);
             if (failure.text == nullptr)
-                returnReferences(kind, rslt, op, path, leadsToSensors, farEnds, &status);
+                returnReferences(kind, rslt, op, path, leadsToSensors, farEnds);
             else
                 marks_.failure(failure.text, line);
             if (!failure.hasExitMark)
@@ -160,7 +167,7 @@ private:
     // Omits associations that the broker cannot make.
     void returnReferences(ResultKind kind, const CMPIResult* rslt, const CMPIObjectPath* op,
         const CMPIObjectPath* path, bool leadsToSensors,
-        const std::vector<CMPIObjectPath*>& farEnds, CMPIStatus* status) const;
+        const std::vector<CMPIObjectPath*>& farEnds) const;
 
     AssociationClass served_;
     const CMPIBroker* broker_;

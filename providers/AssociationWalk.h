@@ -26,8 +26,9 @@ public:
         objects.reserve(factory_.getNumberOfInstances());
     }
 
-    // Returns whether the last enumeration found nothing, as opposed to a failure of the broker.
-    bool foundNothing() const { return result_ == nothingFound; }
+    // Returns whether the last enumeration of sensors found none, as opposed to a failure of the
+    // broker.
+    bool foundNoSensors() const { return sensorsResult_ == nothingFound; }
 
 protected:
     const AssociationRequest& request() const { return request_; }
@@ -38,14 +39,13 @@ protected:
     bool fetchSensors(std::vector<CMPIObjectPath*>& paths)
     {
         reserve(paths);
-        result_ = factory_.getAllSensorCMPIObjPaths(request_.broker(), op_, paths, status_);
-        return result_ == 0;
+        sensorsResult_ = factory_.getAllSensorCMPIObjPaths(request_.broker(), op_, paths, status_);
+        return sensorsResult_ == 0;
     }
     bool fetchCapabilities(std::vector<CMPIObjectPath*>& paths)
     {
-        result_ = factory_.getAllSensorEnabledLogicalElementCapCMPIObjPaths(
-            request_.broker(), op_, paths, status_);
-        return result_ == 0;
+        return factory_.getAllSensorEnabledLogicalElementCapCMPIObjPaths(
+                   request_.broker(), op_, paths, status_) == 0;
     }
 
     // Calls `visit` with a new path of the association, without keys, and its references. Returns
@@ -54,8 +54,6 @@ protected:
     bool visitPair(const CMPIObjectPath* sensor, const CMPIObjectPath* other,
         const FailureTexts& withoutPath, const Visit& visit)
     {
-        copyNameSpace(sensor, op_, status_);
-        copyNameSpace(other, op_, status_);
         const CMPIObjectPath* const path =
             newPath(request_.broker(), op_, request_.served().name, status_);
         if (path == nullptr) {
@@ -73,7 +71,7 @@ private:
     const CMPIObjectPath* op_;
     CMPIStatus* status_;
     SensorFactory factory_;
-    int result_ = 0;
+    int sensorsResult_ = 0;
 };
 
 } // namespace Vorn::SensorProfileProvider

@@ -15,7 +15,7 @@
 namespace Vorn::SensorProfileProvider {
 
 // The broker of a module. It is atomic since a factory may write it while requests run: an object
-// manager creates an association MI at the first request for associations. A request reads it once.
+// manager creates an association MI at the first request for associations.
 using ModuleBroker = std::atomic<const CMPIBroker*>;
 
 // Writes the trace points of one handler.
@@ -49,6 +49,8 @@ private:
 
 inline constexpr const char* noKeyPassed = "At least one key should be passed";
 
+// In these, `status` is passed on to the broker and may be null but for textKey().
+
 // Returns the number of keys of the request's path, 0 when the path is not usable.
 CMPICount keyCountOf(const CMPIObjectPath* ref, CMPIStatus* status);
 
@@ -75,7 +77,7 @@ void returnPaths(const CMPIResult* rslt, const CMPIObjectPath* ref,
     const std::vector<CMPIObjectPath*>& paths, CMPIStatus* status);
 
 // Returns the first instance whose object path equals the request's to the object manager, if it is
-// within the count truncated to 16 bits. `status` is passed on to the broker and may be null.
+// within the count truncated to 16 bits.
 void returnInstanceAt(const CMPIResult* rslt, const CMPIObjectPath* ref,
     const std::vector<CMPIInstance*>& instances, bool comparesReferences, CMPIStatus* status);
 

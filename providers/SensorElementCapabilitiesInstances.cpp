@@ -77,13 +77,15 @@ private:
     {
         if (!isUsable(sensor))
             return report(failures_.sensor);
-        copyNameSpace(sensor, op(), status());
+        copyNameSpace(sensor, op(), nullptr);
         std::vector<CMPIObjectPath*> capabilities;
         if (!fetchCapabilities(capabilities))
             return WalkEnd::atCapabilities;
         for (const CMPIObjectPath* const path : capabilities) {
             if (!isUsable(path))
                 return report(failures_.capabilities);
+            copyNameSpace(path, op(), nullptr);
+            copyNameSpace(sensor, op(), nullptr);
             if (!visitPair(sensor, path, failures_.association, visit))
                 return WalkEnd::reported;
         }
@@ -141,14 +143,11 @@ CMPIStatus SensorElementCapabilities_EnumInstanceNames(
             addReferenceKeys(association, references);
             CMReturnObjectPath(rslt, association);
         });
-    if (end == WalkEnd::reported) {
-        request.marks().exit();
-        return status;
-    }
-    if (end != WalkEnd::complete && !walk.foundNothing())
-        return status; // without an exit mark
-    request.marks().exit();
-    CMReturnDone(rslt);
+    const bool isAnswered = end == WalkEnd::complete || walk.foundNoSensors();
+    if (isAnswered || end == WalkEnd::reported)
+        request.marks().exit(); // after the other ends there is none
+    if (isAnswered)
+        CMReturnDone(rslt);
     return status;
 }
 

@@ -26,7 +26,7 @@ AssociationClass ElementCapabilities::served()
         .name = SensorElementCapabilitiesClass,
         .isCap = true,
         .pair = [](const CMPIObjectPath* sensor, const CMPIObjectPath* other) -> References {
-            return {{{"ManagedElement", sensor}, {"Capabilities", other}}};
+            return {referenceTo("ManagedElement", sensor), referenceTo("Capabilities", other)};
         },
     };
 }

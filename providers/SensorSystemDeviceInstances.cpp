@@ -76,7 +76,7 @@ public:
 private:
     CMPIObjectPath* newSystemPath() const
     {
-        const char* const nameSpace = nameSpaceOf(op(), status());
+        const char* const nameSpace = nameSpaceOf(op(), nullptr);
         if (nameSpace == nullptr || request().broker() == nullptr)
             return nullptr;
         return CMNewObjectPath(request().broker(), nameSpace, ComputerSystemClass, status());
@@ -93,6 +93,8 @@ private:
                 request().fail(failures_.sensor, status());
                 return WalkEnd::reported;
             }
+            copyNameSpace(sensor, op(), nullptr);
+            copyNameSpace(system, op(), nullptr);
             if (!visitPair(sensor, system, failures_.association, visit))
                 return WalkEnd::reported;
         }
@@ -141,8 +143,7 @@ CMPIStatus SensorSystemDevice_EnumInstanceNames(
             "CBEnumInstanceNames Failed for the ZUMLO_ComputerSystem");
         return status;
     }
-    const bool isAnswered =
-        end == WalkEnd::complete || (end == WalkEnd::atSensors && walk.foundNothing());
+    const bool isAnswered = end == WalkEnd::complete || walk.foundNoSensors();
     if (isAnswered || end == WalkEnd::withoutSystemPath)
         request.marks().exit();
     if (isAnswered)

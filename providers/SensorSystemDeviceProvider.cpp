@@ -26,7 +26,7 @@ AssociationClass SystemDevice::served()
         .name = SensorSystemDeviceClass,
         .isCap = false,
         .pair = [](const CMPIObjectPath* sensor, const CMPIObjectPath* other) -> References {
-            return {{{"GroupComponent", other}, {"PartComponent", sensor}}};
+            return {referenceTo("GroupComponent", other), referenceTo("PartComponent", sensor)};
         },
     };
 }

@@ -128,4 +128,18 @@ TEST(ComputerSystemFaultTest, AnArrayThatCannotBeMadeLeavesItsPropertyOut)
     EXPECT_EQ(Testing::property(*request.answer.instances()[0], "EnabledState"), "uint16 2");
 }
 
+// AddressSanitizer watches how far each is read.
+TEST(ComputerSystemFaultTest, EveryValueIsWhole)
+{
+    const Host::Broker broker;
+    FaultyBroker faulty(broker);
+    const FaultyRequest request(broker, faulty, Operation::instances);
+    ASSERT_EQ(request.answer.instances().size(), 1U);
+    const Host::Instance& instance = *request.answer.instances()[0];
+    EXPECT_EQ(Testing::property(instance, "HealthState"), "uint16 5");
+    EXPECT_EQ(Testing::describe(instance.property("OperationalStatus")->array()->elements()[0]),
+        "uint16 2");
+    EXPECT_GE(faulty.count(BrokerCall::setElementAt), 2U);
+}
+
 } // namespace ComputerSystemFaultTests

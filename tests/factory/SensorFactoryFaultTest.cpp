@@ -2,6 +2,7 @@
 
 // What the factory's operations on sensors tell their caller when the broker fails them.
 
+#include "factory/ClassNames.h"
 #include "factory/SensorFactory.h"
 #include "tests/support/FaultyBroker.h"
 #include "tests/support/ProviderTest.h"
@@ -88,6 +89,17 @@ TEST_P(UndeliveredTest, AFailureOfPathsHasItsExitingLine)
     makePaths(&rc_);
     EXPECT_THAT(capture.marksOf("getAllSensorCMPIObjPaths"),
         ElementsAre(::testing::StartsWith("ENTERING"), ::testing::StartsWith("EXITING")));
+}
+
+TEST_F(SensorFactoryFaultTest, APathIsGivenItsNamespaceOnceMoreThenItsHostAndItsKeys)
+{
+    faulty_.watch(path("C").handle());
+    EXPECT_EQ(makePaths(&rc_), 0);
+    const std::string of = std::string(" ") + SensorClass;
+    EXPECT_THAT(
+        std::vector<std::string>(faulty_.pathCalls().begin(), faulty_.pathCalls().begin() + 6),
+        ElementsAre("setNameSpace" + of, "setHostname" + of, "addKey" + of, "addKey" + of,
+            "addKey" + of, "addKey" + of));
 }
 
 // ---- Instances ----

@@ -68,4 +68,32 @@ TEST_F(CapabilitiesProviderFaultTest, AMissingArrayStandsInTheStatusBesideTheIns
     }
 }
 
+TEST_F(CapabilitiesProviderFaultTest, EveryRequestReturnsTheStatusThatTheBrokerLeft)
+{
+    for (const auto& [call, manner] : std::initializer_list<std::pair<BrokerCall, FaultManner>>{
+             {BrokerCall::getNameSpace, FaultManner::nullResult},
+             {BrokerCall::getCharPtr, FaultManner::errorStatus}}) {
+        const auto names = runWithLast(Names, call, manner);
+        EXPECT_EQ(names->status.rc, CMPI_RC_ERR_ACCESS_DENIED);
+        EXPECT_EQ(names->answer.paths().size(), 1U);
+        EXPECT_TRUE(names->answer.isDone());
+    }
+    const auto instances = run(Instances,
+        {BrokerCall::newObjectPath, 1, FaultManner::nullResult, CMPI_RC_ERR_ACCESS_DENIED});
+    EXPECT_EQ(instances->status.rc, CMPI_RC_ERR_ACCESS_DENIED);
+    EXPECT_EQ(instances->answer.refused(), 1U); // the null instance is passed on
+    EXPECT_TRUE(instances->answer.isDone());
+}
+
+// AddressSanitizer watches how far each is read.
+TEST_F(CapabilitiesProviderFaultTest, EveryValueIsWhole)
+{
+    const auto request = run(Instances, std::vector<Fault>{});
+    ASSERT_EQ(request->answer.instances().size(), 1U);
+    const Host::Instance& instance = *request->answer.instances()[0];
+    EXPECT_EQ(property(instance, "ElementNameEditSupported"), "false");
+    EXPECT_EQ(describe(instance.property("RequestedStatesSupported")->array()->elements()[2]),
+        "uint16 2");
+}
+
 } // namespace CapabilitiesProviderFaultTests

@@ -260,6 +260,41 @@ TEST_F(ElementCapabilitiesFaultTest, APathThatCannotCountItsKeysHasNone)
     EXPECT_TRUE(request->answer.isDone());
 }
 
+TEST_F(ElementCapabilitiesFaultTest, APathWhoseKeyCountReportsAFailureLeavesTheStatus)
+{
+    const auto request = run(OneInstance, {BrokerCall::getKeyCount, 1, FaultManner::errorStatus});
+    EXPECT_EQ(request->status.rc, CMPI_RC_OK);
+    EXPECT_EQ(request->answer.instances().size(), 1U);
+}
+
+TEST_F(ElementCapabilitiesFaultTest, NamespacesAndClassNamesLeaveTheStatus)
+{
+    const RequestKind alongAnother = {
+        "alongAnother", Sensor, [](auto* broker, auto* context, auto* result, auto* path) {
+            CMPIAssociationMI* const mi = Kinds.associationFactory(broker, nullptr, nullptr);
+            return mi->ft->associators(mi, context, result, path, "ZUMLO_SensorSystemDevice",
+                nullptr, nullptr, nullptr, nullptr);
+        }};
+    EXPECT_EQ(runWithLast(alongAnother, BrokerCall::getCharPtr)->status.rc, CMPI_RC_OK);
+    const auto unnamed =
+        runWithLast(alongAnother, BrokerCall::getClassName, FaultManner::nullResult);
+    EXPECT_EQ(unnamed->status.rc, CMPI_RC_OK);
+    expectNamespacesLeaveTheStatus(Names);
+    for (const auto* const kinds : {FromSensor, FromCapabilities})
+        for (const Which which : {Associators, AssociatorNames, References, ReferenceNames})
+            expectNamespacesLeaveTheStatus(kinds[which]);
+}
+
+TEST_F(ElementCapabilitiesFaultTest, TheCapabilitiesAreGivenTheirNamespaceBeforeTheSensor)
+{
+    expectNameSpacesInOrder(Names, Class, CapabilitiesClass, "ZUMLO_NumericSensor");
+}
+
+TEST_F(ElementCapabilitiesFaultTest, EveryValueIsWhole)
+{
+    expectWholeValues(Names, Instances, {"Capabilities", CapabilitiesClass});
+}
+
 // ---- Associated objects. The first path that is made is the target; for references the
 // ---- association's follows, and then come the far ends. ----
 
@@ -318,6 +353,24 @@ TEST_F(ElementCapabilitiesFaultTest, WithoutAnAssociationPathThereAreNoReference
             EXPECT_THAT(request->answer.instances(), IsEmpty());
             EXPECT_EQ(request->answer.refused(), 0U);
         }
+}
+
+TEST_F(ElementCapabilitiesFaultTest, EveryAssociatorNameIsGivenItsNamespaceOnceMore)
+{
+    run(FromCapabilities[AssociatorNames], std::vector<Fault>{});
+    EXPECT_EQ(timesCalled("setNameSpace", "ZUMLO_NumericSensor"), 1 + 2 * 2); // and the target's
+    run(FromSensor[AssociatorNames], std::vector<Fault>{});
+    EXPECT_EQ(timesCalled("setNameSpace", CapabilitiesClass), 1 + 2);
+}
+
+TEST_F(ElementCapabilitiesFaultTest, AssociatorsEndInTheStatusThatTheBrokerLeft)
+{
+    const auto capabilities = run(FromSensor[Associators],
+        {BrokerCall::newObjectPath, 2, FaultManner::nullResult, CMPI_RC_ERR_ACCESS_DENIED});
+    EXPECT_EQ(capabilities->status.rc, CMPI_RC_ERR_ACCESS_DENIED);
+    const auto sensors = runWithLast(FromCapabilities[Associators], BrokerCall::newArray);
+    EXPECT_EQ(sensors->status.rc, CMPI_RC_ERR_ACCESS_DENIED);
+    EXPECT_EQ(sensors->answer.instances().size(), 2U);
 }
 
 TEST_F(ElementCapabilitiesFaultTest, AReferenceThatCannotBeMadeIsLeftOut)

@@ -164,6 +164,22 @@ TEST_F(FailingElementCapabilitiesTest, NamesAreOrderedByCapabilitiesInsideSensor
     EXPECT_THAT(pairs("ManagedElement", "Capabilities"), AllPairsInOrder);
 }
 
+TEST_F(FailingElementCapabilitiesTest, NamesWithoutCapabilitiesEndWithoutAnExitMarkInAnOpenResult)
+{
+    CMPIStatus status = {CMPI_RC_OK, nullptr};
+    for (const int result : {1, 2}) {
+        capabilitiesPathsResult = result;
+        const Lines lines = ownLines(
+            traceOf([&] { status = enumerateNames(path("ZUMLO_SensorElementCapabilities")); }));
+        capabilitiesPathsResult = 0;
+        const HandlerLines handler = {"SensorElementCapabilities",
+            "SensorElementCapabilitiesProvider", "SensorElementCapabilities_EnumInstanceNames"};
+        EXPECT_EQ(lines, handler.entry());
+        expectOk(status);
+        expectNothing(false);
+    }
+}
+
 TEST_F(FailingElementCapabilitiesTest, InstancesAreOrderedByCapabilitiesInsideSensors)
 {
     expectOk(enumerate(path("ZUMLO_SensorElementCapabilities")));

@@ -74,6 +74,8 @@ int SensorFactory::getOneSensorEnabledLogicalElementCapCMPIInstance(const CMPIBr
 int SensorFactory::getAllSensorEnabledLogicalElementCapCMPIObjPaths(const CMPIBroker* broker,
     const CMPIObjectPath* ref, std::vector<CMPIObjectPath*>& paths, CMPIStatus*)
 {
+    if (Testing::capabilitiesPathsResult != 0)
+        return Testing::capabilitiesPathsResult;
     return addPaths(
         broker, ref, SensorEnabledLogicalElementCapClass, "InstanceID", {"1", "2"}, paths);
 }

@@ -9,4 +9,7 @@ namespace Testing {
 // What enumerations that fail put into the status.
 inline constexpr CMPIrc FailedEnumeration = CMPI_RC_ERR_ACCESS_DENIED;
 
+// What the enumeration of the paths of capabilities returns; other than 0 without any path.
+inline int capabilitiesPathsResult = 0;
+
 } // namespace Testing

@@ -183,6 +183,43 @@ protected:
         return traced;
     }
 
+    // That what the broker reports of a namespace or of its characters is not the status.
+    void expectNamespacesLeaveTheStatus(const RequestKind& kind)
+    {
+        const auto unread = runWithLast(kind, BrokerCall::getNameSpace, FaultManner::nullResult);
+        EXPECT_EQ(unread->status.rc, CMPI_RC_OK) << kind;
+        EXPECT_EQ(runWithLast(kind, BrokerCall::getCharPtr)->status.rc, CMPI_RC_OK) << kind;
+    }
+
+    // That the first association of an enumeration of names is made after its ends were given
+    // their namespace in this order.
+    void expectNameSpacesInOrder(const RequestKind& names, const std::string& association,
+        const std::string& first, const std::string& second)
+    {
+        run(names, std::vector<Fault>{});
+        std::vector<std::string> settings;
+        for (const std::string& call : faulty_->pathCalls())
+            if (call.starts_with("setNameSpace "))
+                settings.push_back(call.substr(call.find(' ') + 1));
+        const auto made = std::find(settings.begin(), settings.end(), association);
+        ASSERT_GE(made - settings.begin(), 2);
+        EXPECT_EQ(*(made - 2), first);
+        EXPECT_EQ(*(made - 1), second);
+    }
+
+    // That values are read whole, which AddressSanitizer watches, and say what they say.
+    void expectWholeValues(const RequestKind& names, const RequestKind& instances, const End& end)
+    {
+        const auto paths = run(names, std::vector<Fault>{});
+        EXPECT_GE(faulty_->count(BrokerCall::addKey), 4U);
+        ASSERT_FALSE(paths->answer.paths().empty());
+        expectEnd(paths->answer.paths()[0]->key(end.role), end);
+        const auto objects = run(instances, std::vector<Fault>{});
+        EXPECT_GE(faulty_->count(BrokerCall::setProperty), 4U);
+        ASSERT_FALSE(objects->answer.instances().empty());
+        expectEnd(objects->answer.instances()[0]->property(end.role), end);
+    }
+
     // A status of its own, and an answer that is not ended.
     static void expectBrokenOff(const FaultyRequest& request, const std::string& statusText)
     {

@@ -7,6 +7,7 @@
 #include "tests/support/FaultSweep.h"
 #include "tests/support/ProviderTest.h"
 
+#include <algorithm>
 #include <functional>
 #include <memory>
 #include <ostream>
@@ -105,6 +106,22 @@ protected:
     std::unique_ptr<FaultyRequest> run(const RequestKind& kind, const Fault& fault)
     {
         return run(kind, std::vector<Fault>{fault});
+    }
+
+    // Runs the request with a status of the last call of its kind, by default beside its result.
+    std::unique_ptr<FaultyRequest> runWithLast(
+        const RequestKind& kind, BrokerCall call, FaultManner manner = FaultManner::errorStatus)
+    {
+        run(kind, std::vector<Fault>{});
+        const unsigned last = faulty_->count(call);
+        return run(kind, {call, last, manner, CMPI_RC_ERR_ACCESS_DENIED});
+    }
+
+    // How often the last request called the function of a path of the class.
+    std::ptrdiff_t timesCalled(const std::string& call, const std::string& className) const
+    {
+        const std::vector<std::string>& calls = faulty_->pathCalls();
+        return std::count(calls.begin(), calls.end(), call + " " + className);
     }
 
     // How the first call of the kind can fail to deliver its object.

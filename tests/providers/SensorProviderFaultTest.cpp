@@ -212,6 +212,38 @@ TEST_F(SensorProviderFaultTest, TheStatusThatTheBrokerLeftIsReturned)
     EXPECT_EQ(request->status.msg, nullptr);
 }
 
+TEST_F(SensorProviderFaultTest, EveryRequestReturnsTheStatusThatTheBrokerLeft)
+{
+    for (const auto& [call, manner] : std::initializer_list<std::pair<BrokerCall, FaultManner>>{
+             {BrokerCall::getNameSpace, FaultManner::nullResult},
+             {BrokerCall::getCharPtr, FaultManner::errorStatus}}) {
+        const auto names = runWithLast(kindOf(Operation::names), call, manner);
+        EXPECT_EQ(names->status.rc, CMPI_RC_ERR_ACCESS_DENIED);
+        EXPECT_EQ(names->answer.paths().size(), 2U);
+        EXPECT_TRUE(names->answer.isDone());
+    }
+    const auto instances = runWithLast(kindOf(Operation::instances), BrokerCall::newArray);
+    EXPECT_EQ(instances->status.rc, CMPI_RC_ERR_ACCESS_DENIED);
+    EXPECT_EQ(instances->answer.instances().size(), 2U);
+    const auto searched = run(Operation::instanceByPath,
+        {BrokerCall::getObjectPath, 2, FaultManner::errorStatus, CMPI_RC_ERR_ACCESS_DENIED});
+    EXPECT_EQ(searched->status.rc, CMPI_RC_ERR_ACCESS_DENIED);
+    EXPECT_TRUE(searched->answer.isDone());
+}
+
+// AddressSanitizer watches how far each is read.
+TEST_F(SensorProviderFaultTest, EveryValueIsWhole)
+{
+    const auto request = FaultTest::run(kindOf(Operation::oneInstance), std::vector<Fault>{});
+    ASSERT_EQ(request->answer.instances().size(), 1U);
+    const Host::Instance& instance = *request->answer.instances()[0];
+    EXPECT_EQ(property(instance, "SensorType"), "uint16 5");
+    EXPECT_EQ(property(instance, "UnitModifier"), "sint32 0");
+    EXPECT_EQ(
+        describe(instance.property("PossibleStates")->array()->elements()[0]), "string \"Normal\"");
+    EXPECT_EQ(faulty_->count(BrokerCall::setProperty), 22U);
+}
+
 TEST_F(SensorProviderFaultTest, ALabelThatCannotBeMadeIsAnEmptyElement)
 {
     const char* properties[] = {"PossibleStates", nullptr};

@@ -129,6 +129,37 @@ TEST_F(SystemDeviceAssociationFaultTest, APathThatIsNotToldLeavesTheStatus)
         EXPECT_EQ(run(kind, fault)->status.rc, CMPI_RC_OK) << kind;
 }
 
+TEST_F(SystemDeviceAssociationFaultTest, APathWhoseKeyCountReportsAFailureLeavesTheStatus)
+{
+    const auto request = run(OneInstance, {BrokerCall::getKeyCount, 1, FaultManner::errorStatus});
+    EXPECT_EQ(request->status.rc, CMPI_RC_OK);
+    EXPECT_EQ(countOf(*request), 1U);
+}
+
+TEST_F(SystemDeviceAssociationFaultTest, NamespacesLeaveTheStatus)
+{
+    expectNamespacesLeaveTheStatus(Names);
+    for (const auto* const kinds : {FromSensor, FromSystem})
+        for (const Which which : {Associators, AssociatorNames, References, ReferenceNames})
+            expectNamespacesLeaveTheStatus(kinds[which]);
+}
+
+TEST_F(SystemDeviceAssociationFaultTest, TheSensorIsGivenItsNamespaceBeforeTheSystem)
+{
+    expectNameSpacesInOrder(Names, Class, "ZUMLO_NumericSensor", GroupClass);
+}
+
+TEST_F(SystemDeviceAssociationFaultTest, EveryValueIsWhole)
+{
+    expectWholeValues(Names, Instances, {"GroupComponent", GroupClass});
+}
+
+TEST_F(SystemDeviceAssociationFaultTest, EveryAssociatorNameIsGivenItsNamespaceOnceMore)
+{
+    run(FromSystem[AssociatorNames], std::vector<Fault>{});
+    EXPECT_EQ(timesCalled("setNameSpace", "ZUMLO_NumericSensor"), 1 + 2 * 2); // and the target's
+}
+
 TEST_F(SystemDeviceAssociationFaultTest, AnAbsentEnumerationHasNoFarEnds)
 {
     for (const FaultManner manner : Undelivered)

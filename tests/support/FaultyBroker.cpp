@@ -12,6 +12,7 @@
 #include "host/broker/Tables.h"
 #include "tests/support/TraceRecorder.h"
 
+#include <cstring>
 #include <tuple>
 #include <type_traits>
 
@@ -125,6 +126,31 @@ void loseHandle(Handle* object, const Rest&...)
     const_cast<std::remove_const_t<Handle>*>(object)->hdl = nullptr;
 }
 
+// Replaces the address of a value by that of a copy of a whole CMPIValue. Texts are their own
+// address.
+template <typename... Others>
+void copyValue(CMPIValue&, const Others&...)
+{
+}
+template <typename Handle, typename Name>
+void copyValue(
+    CMPIValue& copy, const Handle*, const Name&, const CMPIValue*& value, const CMPIType& type)
+{
+    if (value == nullptr || type == CMPI_chars)
+        return;
+    std::memcpy(&copy, value, sizeof copy);
+    value = &copy;
+}
+
+const Fault* faultOf(BrokerCall call, const void*)
+{
+    return FaultyBroker::arrived(call);
+}
+const Fault* faultOf(BrokerCall call, const CMPIObjectPath* path)
+{
+    return FaultyBroker::arrived(call, path);
+}
+
 template <BrokerCall call, auto slot>
 struct Interposed;
 template <BrokerCall call, typename Table, typename Answer, typename... Arguments,
@@ -132,13 +158,15 @@ template <BrokerCall call, typename Table, typename Answer, typename... Argument
 struct Interposed<call, slot> {
     static Answer function(Arguments... arguments)
     {
+        CMPIValue copy{};
+        copyValue(copy, arguments...);
         const auto realCall = [&] {
             const Answer answer = (realTable<Table>().*slot)(arguments...);
             watchObject(answer);
             (watchObject(arguments), ...);
             return answer;
         };
-        const Fault* const fault = FaultyBroker::arrived(call);
+        const Fault* const fault = faultOf(call, std::get<0>(std::tie(arguments...)));
         if (fault == nullptr)
             return realCall();
         if constexpr (std::is_same_v<Answer, CMPIStatus>) {
@@ -277,6 +305,7 @@ void FaultyBroker::reset()
 {
     faults_.clear();
     calls_.clear();
+    pathCalls_.clear();
     counts_.fill(0);
     fired_ = 0;
 }
@@ -298,6 +327,14 @@ const Fault* FaultyBroker::arrived(BrokerCall call)
             return &fault;
         }
     return nullptr;
+}
+
+const Fault* FaultyBroker::arrived(BrokerCall call, const CMPIObjectPath* path)
+{
+    const Host::ObjectPath* const called = Host::ObjectPath::of(path);
+    if (inForce != nullptr && called != nullptr)
+        inForce->pathCalls_.push_back(nameOf(call) + " " + std::string(called->className()));
+    return arrived(call);
 }
 
 } // namespace Testing

@@ -1,7 +1,9 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
 // A broker that fails on demand: it stands between a provider and the embedded broker,
-// counts the calls of each kind, and makes the n-th call of a kind fail.
+// counts the calls of each kind, and makes the n-th call of a kind fail. It copies a whole
+// CMPIValue from each address of a property, an array element or a key, as some object managers do:
+// AddressSanitizer reports a value that is shorter.
 //
 // A test runs the provider once to learn how many calls of each kind it makes, then once for
 // each of them with a fault planned:
@@ -66,12 +68,17 @@ public:
     unsigned count(BrokerCall call) const;
     // Every call in order.
     const std::vector<BrokerCall>& calls() const noexcept { return calls_; }
+    // Every call of a path's function in order with the class of the path, such as
+    // "addKey ZUMLO_NumericSensor".
+    const std::vector<std::string>& pathCalls() const noexcept { return pathCalls_; }
     // How many planned faults came true.
     unsigned fired() const noexcept { return fired_; }
 
     // For the interposed functions: counts a call and says how it fails; null when it is to
     // succeed, or when no faulty broker is in force.
     static const Fault* arrived(BrokerCall call);
+    // The same for a function of a path.
+    static const Fault* arrived(BrokerCall call, const CMPIObjectPath* path);
 
 private:
     CMPIBrokerFT upcalls_;
@@ -79,6 +86,7 @@ private:
     FaultyBroker* before_;
     std::vector<Fault> faults_;
     std::vector<BrokerCall> calls_;
+    std::vector<std::string> pathCalls_;
     std::array<unsigned, brokerCallCount> counts_{};
     unsigned fired_ = 0;
 };
