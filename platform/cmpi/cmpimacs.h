@@ -653,45 +653,4 @@ CMPI_INLINE CMPIBoolean CMEvaluatePredicateUsingAccessor(const CMPIPredicate* pr
     return predicate->ft->evaluateUsingAccessor(predicate, accessor, parameter, rc);
 }
 
-/* ---- Provider factories and their function tables ----
-   Each stub macro defines the function table and the exported factory function of one
-   management interface. `prefix` begins the names of the provider's handlers, `name` is the
-   provider's name, `brokerVariable` takes the broker, `hook` is a statement run by the factory
-   (CMNoHook when there is none). */
-
-#define CMNoHook
-
-#define CMPI_FACTORY_(kind, prefix, name, brokerVariable, hook)                                \
-    CMPI_EXTERN_C CMPI_EXPORT CMPI##kind##MI* name##_Create_##kind##MI(                        \
-        const CMPIBroker* cmpi_broker, const CMPIContext* cmpi_context, CMPIStatus* cmpi_rc);  \
-    CMPI_EXTERN_C CMPI_EXPORT CMPI##kind##MI* name##_Create_##kind##MI(                        \
-        const CMPIBroker* cmpi_broker, const CMPIContext* cmpi_context, CMPIStatus* cmpi_rc)   \
-    {                                                                                          \
-        static CMPI##kind##MI mi = {NULL, &prefix##_##kind##MIFT};                             \
-        (void)cmpi_context;                                                                    \
-        CMSetStatus(cmpi_rc, CMPI_RC_OK);                                                      \
-        brokerVariable = cmpi_broker;                                                          \
-        hook;                                                                                  \
-        return &mi;                                                                            \
-    }
-
-#define CMInstanceMIStub(prefix, name, brokerVariable, hook)                                   \
-    static const CMPIInstanceMIFT prefix##_InstanceMIFT = {CMPICurrentVersion,                 \
-        CMPICurrentVersion, "instance" #name, prefix##Cleanup, prefix##EnumInstanceNames,      \
-        prefix##EnumInstances, prefix##GetInstance, prefix##CreateInstance,                    \
-        prefix##ModifyInstance, prefix##DeleteInstance, prefix##ExecQuery};                    \
-    CMPI_FACTORY_(Instance, prefix, name, brokerVariable, hook)
-
-#define CMAssociationMIStub(prefix, name, brokerVariable, hook)                                \
-    static const CMPIAssociationMIFT prefix##_AssociationMIFT = {CMPICurrentVersion,           \
-        CMPICurrentVersion, "association" #name, prefix##AssociationCleanup,                   \
-        prefix##Associators, prefix##AssociatorNames, prefix##References,                      \
-        prefix##ReferenceNames};                                                               \
-    CMPI_FACTORY_(Association, prefix, name, brokerVariable, hook)
-
-#define CMMethodMIStub(prefix, name, brokerVariable, hook)                                     \
-    static const CMPIMethodMIFT prefix##_MethodMIFT = {CMPICurrentVersion,                     \
-        CMPICurrentVersion, "method" #name, prefix##MethodCleanup, prefix##InvokeMethod};      \
-    CMPI_FACTORY_(Method, prefix, name, brokerVariable, hook)
-
 #endif
