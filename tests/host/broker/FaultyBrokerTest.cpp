@@ -63,7 +63,7 @@ TEST_F(FaultyBrokerTest, ValuesFailByTheirType)
 {
     FaultyBroker faulty(broker);
     CMPIObjectPath* const made = CMNewObjectPath(faulty.handle(), "ns", "C", &rc);
-    CMPIObjectPath* const reference = CMNewObjectPath(faulty.handle(), "ns", "R", &rc);
+    const CMPIValue reference = {.ref = CMNewObjectPath(faulty.handle(), "ns", "R", &rc)};
     CMAddKey(made, "Text", "1", CMPI_chars);
     CMAddKey(made, "Ref", &reference, CMPI_ref);
     faulty.plan({BrokerCall::getKey, 1, FaultManner::handleless, CMPI_RC_OK});
