@@ -197,7 +197,7 @@ void printLargeAnswer()
     for (int round = 0; round < 3; ++round) {
         const auto begin = Clock::now();
         client.send(enumerateInstances());
-        if (!client.hasReplyWithin(HttpClient::patience))
+        if (!client.hasReplyWithin(HttpClient::timeout))
             throw std::runtime_error("no answer");
         const double first = Milliseconds(Clock::now() - begin).count();
         const std::size_t bytes = skim(client);

@@ -231,7 +231,9 @@ void Daemon::logLine(void* daemon, const char* format, std::va_list arguments) n
     while (line.ends_with('\n'))
         line.remove_suffix(1);
     auto& self = *static_cast<Daemon*>(daemon);
-    const bool isReported = !self.isStarted_ || self.lines_.allowsReport();
+    // Most lines are about what single clients did; "Failed to create a new thread" is not.
+    const bool isFailure = line.find("Failed") != std::string_view::npos;
+    const bool isReported = !self.isStarted_ || (isFailure && self.lines_.allowsReport());
     (isReported ? report : reportDetail)({"logLine", "Daemon", __LINE__}, line);
 }
 

@@ -52,7 +52,7 @@ protected:
     }
 };
 
-TEST_F(LimitsTest, LinesOfTheHttpLibraryAreReportedOnceAMinute)
+TEST_F(LimitsTest, FailuresOfTheHttpLibraryAreReportedOnceAMinute)
 {
     start();
     const Testing::LogCapture log(4000);
