@@ -20,7 +20,7 @@ choose_provider_folder() {
   is_folder_known=false
 }
 
-wants_library() { "$with_computer_system" || [ "$1" != libComputerSystemProvider.so ]; }
+wants_library() { "$with_computer_system" || [ "$1" != "${libraries[1]}" ]; }
 
 is_same_folder() { [ "$(readlink -f "$1")" = "$(readlink -f "$2")" ]; }
 

@@ -16,7 +16,7 @@
 
 namespace ComputerSystemLibraryTests {
 
-const std::string library = SENSOR_PROFILE_BINARY_DIR "/lib/libComputerSystemProvider.so";
+const std::string library = SENSOR_PROFILE_BINARY_DIR "/lib/libSensorProfileComputerSystem.so";
 
 TEST(ComputerSystemLibraryTest, ExportsItsFactoryAndNothingElse)
 {

@@ -21,7 +21,7 @@ using testing::UnorderedElementsAre;
 using namespace Testing;
 
 constexpr const char* sensorLibrary = "lib/cmpi/libSensorProfileProvider.so";
-constexpr const char* systemLibrary = "lib/cmpi/libComputerSystemProvider.so";
+constexpr const char* systemLibrary = "lib/cmpi/libSensorProfileComputerSystem.so";
 
 std::string readelf(const std::string& options, const std::string& name)
 {

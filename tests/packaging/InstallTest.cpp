@@ -24,7 +24,7 @@ RunOptions installedTool(std::map<std::string, std::string> environment = {})
     return {.program = installedFile("bin/sensorctl"), .environment = std::move(environment)};
 }
 
-const std::vector<std::string> providerFiles = {"lib/cmpi/libComputerSystemProvider.so",
+const std::vector<std::string> providerFiles = {"lib/cmpi/libSensorProfileComputerSystem.so",
     "lib/cmpi/libSensorProfileProvider.so", "sbin/sensor-profile-register",
     "share/doc/sensor-profile-provider/changelog.gz",
     "share/doc/sensor-profile-provider/operations.md", "share/man/man5/sensor-profile-model.5.gz",

@@ -92,10 +92,11 @@ TEST_F(OpenPegasusTest, RemovesNothingWhereNothingIsRegistered)
 TEST_F(OpenPegasusTest, LinksTheLibrariesIntoTheFolderOfProviders)
 {
     EXPECT_THAT(mustRun({"register"}), Not(HasSubstr("must look")));
-    for (const char* const name : {"libSensorProfileProvider.so", "libComputerSystemProvider.so"})
+    for (const char* const name :
+        {"libSensorProfileProvider.so", "libSensorProfileComputerSystem.so"})
         EXPECT_EQ(fs::read_symlink(path("providers") + "/" + name), library(name));
     EXPECT_THAT(
-        links(), ElementsAre("libComputerSystemProvider.so", "libSensorProfileProvider.so"));
+        links(), ElementsAre("libSensorProfileComputerSystem.so", "libSensorProfileProvider.so"));
     mustRun({"register"});
     EXPECT_EQ(links().size(), 2U);
     mustRun({"remove"});
@@ -104,19 +105,19 @@ TEST_F(OpenPegasusTest, LinksTheLibrariesIntoTheFolderOfProviders)
 
 TEST_F(OpenPegasusTest, RefusesToTakeThePlaceOfAnotherLibrary)
 {
-    folder_.write("providers/libComputerSystemProvider.so", "another one");
+    folder_.write("providers/libSensorProfileComputerSystem.so", "another one");
     const Ended ended = runRegister({"register"});
     EXPECT_EQ(ended.code, 1);
-    EXPECT_THAT(ended.err,
-        AllOf(HasSubstr(path("providers/libComputerSystemProvider.so") + " is somebody else's"),
-            HasSubstr("Nothing was changed.")));
+    EXPECT_THAT(ended.err, AllOf(HasSubstr(path("providers/libSensorProfileComputerSystem.so") +
+                                           " is somebody else's"),
+                               HasSubstr("Nothing was changed.")));
     EXPECT_THAT(calls(), ElementsAre("cimprovider -l"));
-    EXPECT_THAT(links(), ElementsAre("libComputerSystemProvider.so"));
+    EXPECT_THAT(links(), ElementsAre("libSensorProfileComputerSystem.so"));
 
     mustRun({"register", "--without-computer-system"});
-    EXPECT_EQ(contentOf(path("providers/libComputerSystemProvider.so")), "another one");
+    EXPECT_EQ(contentOf(path("providers/libSensorProfileComputerSystem.so")), "another one");
     mustRun({"remove"});
-    EXPECT_THAT(links(), ElementsAre("libComputerSystemProvider.so"));
+    EXPECT_THAT(links(), ElementsAre("libSensorProfileComputerSystem.so"));
 }
 
 TEST_F(OpenPegasusTest, RegistersTheSensorsWithoutTheComputerSystem)

@@ -136,7 +136,7 @@ protected:
     TemporaryFolder folder_;
     const std::string program_ = installedFile("sbin/sensor-profile-register");
     static constexpr const char* sensorLibrary_ = "libSensorProfileProvider.so";
-    static constexpr const char* systemLibrary_ = "libComputerSystemProvider.so";
+    static constexpr const char* systemLibrary_ = "libSensorProfileComputerSystem.so";
 
 private:
     static std::string succeeding(const Ended& ended)

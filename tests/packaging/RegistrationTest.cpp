@@ -39,7 +39,7 @@ std::vector<Registration> embeddedTable()
 {
     std::vector<Registration> table;
     for (const Host::ProviderRegistration& each :
-        Host::sensorProfileProviders("SensorProfileProvider", "ComputerSystemProvider")) {
+        Host::sensorProfileProviders("SensorProfileProvider", "SensorProfileComputerSystem")) {
         const std::string kinds = each.servesAssociations ? "instance association" : "instance";
         table.push_back({each.className, each.providerName, each.libraryFile, kinds, nameSpace});
     }

@@ -52,7 +52,7 @@ TEST_F(SfcbTest, StagesTheFilesAndBuildsTheRepository)
                              "mofs/root/cimv2/sensor-profile.mof", "regs/sensor-profile.reg"));
     EXPECT_EQ(stagedRegistration(), contentOf(shared("registration/sensor-profile.reg")));
     EXPECT_THAT(
-        links(), ElementsAre("libComputerSystemProvider.so", "libSensorProfileProvider.so"));
+        links(), ElementsAre("libSensorProfileComputerSystem.so", "libSensorProfileProvider.so"));
 }
 
 TEST_F(SfcbTest, NamesNoFoldersThatNobodyNamed)

@@ -18,7 +18,7 @@ inline const std::string sensorctl = SENSOR_PROFILE_BINARY_DIR "/bin/sensorctl";
 inline const std::string sensorLibrary =
     SENSOR_PROFILE_BINARY_DIR "/lib/libSensorProfileProvider.so";
 inline const std::string systemLibrary =
-    SENSOR_PROFILE_BINARY_DIR "/lib/libComputerSystemProvider.so";
+    SENSOR_PROFILE_BINARY_DIR "/lib/libSensorProfileComputerSystem.so";
 
 // How a program ended, and what it wrote.
 struct Ended {

@@ -12,7 +12,7 @@ namespace Tools {
 namespace {
 
 constexpr const char* sensorLibrary = "libSensorProfileProvider.so";
-constexpr const char* computerSystemLibrary = "libComputerSystemProvider.so";
+constexpr const char* computerSystemLibrary = "libSensorProfileComputerSystem.so";
 
 // Relative to the folder of the tool's executable. Object managers load providers from `cmpi`
 // folders; SENSOR_PROFILE_ARCHITECTURE is Debian's name, such as x86_64-linux-gnu.

@@ -25,7 +25,8 @@ namespace SensorProfileTests {
 using testing::HasSubstr;
 
 const std::string sensorLibrary = SENSOR_PROFILE_BINARY_DIR "/lib/libSensorProfileProvider.so";
-const std::string systemLibrary = SENSOR_PROFILE_BINARY_DIR "/lib/libComputerSystemProvider.so";
+const std::string systemLibrary =
+    SENSOR_PROFILE_BINARY_DIR "/lib/libSensorProfileComputerSystem.so";
 
 constexpr const char* nameSpace = "root/cimv2";
 constexpr const char* model = R"({ "nodes": [

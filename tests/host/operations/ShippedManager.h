@@ -19,7 +19,7 @@ public:
               classes(),
               Host::sensorProfileProviders(SENSOR_PROFILE_BINARY_DIR
                   "/lib/libSensorProfileProvider.so",
-                  SENSOR_PROFILE_BINARY_DIR "/lib/libComputerSystemProvider.so"),
+                  SENSOR_PROFILE_BINARY_DIR "/lib/libSensorProfileComputerSystem.so"),
               [] { return std::string("host.example"); }, limits)
     {
     }

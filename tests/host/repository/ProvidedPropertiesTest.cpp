@@ -29,7 +29,7 @@ protected:
     std::unique_ptr<const Host::Repository> repository_ = Testing::shippedClasses();
     Host::Manager manager_{*repository_,
         Host::sensorProfileProviders(SENSOR_PROFILE_BINARY_DIR "/lib/libSensorProfileProvider.so",
-            SENSOR_PROFILE_BINARY_DIR "/lib/libComputerSystemProvider.so")};
+            SENSOR_PROFILE_BINARY_DIR "/lib/libSensorProfileComputerSystem.so")};
 };
 
 TEST_P(ProvidedPropertiesTest, AreDeclaredWithTheTypeTheyHave)
