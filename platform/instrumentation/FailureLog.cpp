@@ -10,8 +10,8 @@ namespace Vorn {
 
 namespace {
 
-// Entries come from the environment and are few; the bound is for a process that changes its
-// environment again and again.
+// The entries come from the environment and are few. The bound covers a process that changes its
+// environment repeatedly.
 constexpr std::size_t maximumEntries = 64;
 
 bool isKnown(const std::map<SourceStep, std::string>& reasons, const std::string& reason)

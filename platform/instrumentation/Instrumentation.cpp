@@ -20,7 +20,7 @@ using NodeLexicon::Properties;
 
 namespace {
 
-// The sources of a process whose settings name none.
+// The default of VORN_INSTRUMENTATION.
 constexpr const char* defaultSources = "hwmon";
 
 std::string sourceListFromEnvironment()
@@ -87,7 +87,7 @@ struct Instrumentation::State {
     std::vector<OpenSource> sources;
     NodeType type{};
     std::size_t place = 0;              // the source of the node under the cursor
-    std::size_t index = 0;              // the node's place among those of its source
+    std::size_t index = 0;              // the node's index among those of its source
     std::optional<NodeReading> reading; // of the node under the cursor, once it was read
 
     State();
@@ -114,7 +114,7 @@ Instrumentation::State::State()
 
 void Instrumentation::State::select(NodeType selected)
 {
-    place = sources.size(); // past the last node, should a source fail
+    place = sources.size(); // stays past the last node where a source fails
     reading.reset();
     type = selected;
     for (OpenSource& open : sources)
@@ -135,7 +135,7 @@ void Instrumentation::State::advance()
 void Instrumentation::State::passFinishedSources()
 {
     for (; isOnNode() && index >= sources[place].nodes.size(); ++place, index = 0)
-        // Only a walk to the end shows that every node can be read.
+        // Only an iteration that reaches the end proves that every node can be read.
         FailureLog::instance().succeeded(sources[place].entry, {SourceStep::Stage::Reading, type});
 }
 

@@ -85,7 +85,7 @@ FileStamp stampOfRegularFile(const std::string& path)
 
 FileContent readRegularFile(const std::string& path, std::size_t limit)
 {
-    stampOfRegularFile(path); // opening a device can have effects of its own
+    stampOfRegularFile(path); // opening a device can have side effects
     const Descriptor file(path);
     struct stat status {};
     if (fstat(file.number(), &status) != 0)

@@ -9,7 +9,8 @@ namespace Vorn {
 
 namespace {
 
-// The place of the comma that ends the entry which begins at `from`, or the end of the list.
+// Returns the position of the comma that ends the entry which begins at `from`, or the end of the
+// list.
 std::size_t endOfEntry(const std::string& list, std::size_t from)
 {
     for (std::size_t at = from; at < list.size(); ++at) {

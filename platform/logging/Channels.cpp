@@ -25,8 +25,8 @@ std::unique_ptr<spdlog::logger> makeLogger(const SinkSetting& setting)
     auto sink = makeSink(setting);
     if (!sink)
         return nullptr;
-    // Not registered anywhere: spdlog's registry belongs to the process. Errors are kept from
-    // standard error, where spdlog reports them by default.
+    // The logger is not registered, since spdlog's registry belongs to the process. Its error
+    // handler replaces spdlog's, which writes to standard error.
     auto logger = std::make_unique<spdlog::logger>(std::string(), std::move(sink));
     logger->set_level(spdlog::level::trace);
     logger->set_error_handler([](const std::string& reason) { throw std::runtime_error(reason); });
@@ -39,7 +39,7 @@ constexpr long long notConfigured = std::numeric_limits<long long>::min();
 
 // These stay usable while the library is unloaded or the process ends: threads may still log.
 constinit std::atomic<long long> wantedLevel{notConfigured};
-constinit std::mutex guard; // of all below
+constinit std::mutex guard; // for the variables that follow
 constinit bool unloading = false;
 
 struct Current {
@@ -114,7 +114,7 @@ std::string Channel::problem() const
     return problem_;
 }
 
-// Reports to syslog once: a sink that fails now and then would fill the system's log.
+// Reports to syslog once: a sink that fails intermittently would fill the system's log.
 void Channel::setProblem(std::string problem) const
 {
     const std::lock_guard lock(guard_);

@@ -10,7 +10,7 @@ namespace RynLog {
 
 namespace {
 
-// Empty when the variable is not set.
+// Returns an empty text when the variable is not set.
 std::string environmentText(const char* variable)
 {
     const char* value = ::secure_getenv(variable);

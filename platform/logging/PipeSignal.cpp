@@ -51,7 +51,7 @@ int writeWhole(int descriptor, std::string_view bytes) noexcept
     return error;
 }
 
-// The descriptor stays blocking, since other processes share that setting.
+// The descriptor stays blocking, since other processes share its open file description.
 int writeToStandardError(std::string_view text) noexcept
 {
     int error = 0;

@@ -41,7 +41,7 @@ protected:
     {
     }
 
-    // Returns 0 or an errno.
+    // Returns 0 or an error number of errno.h.
     virtual int write(std::string_view line) noexcept = 0;
 
     void sink_it_(const spdlog::details::log_msg& message) override
@@ -66,8 +66,8 @@ protected:
     int write(std::string_view line) noexcept override { return writeToStandardError(line); }
 };
 
-// One line is one write to an open file, unbuffered, so that lines of several threads and
-// processes stay whole.
+// Writes each line to the open file at once and unbuffered, so that lines of several threads and
+// processes are not interleaved.
 class FileSink : public DescriptorSink {
 public:
     // Owns the descriptor.

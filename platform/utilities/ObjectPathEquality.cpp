@@ -98,8 +98,8 @@ struct ValueEquality {
     }
 };
 
-// Every key of one side has its own partner on the other, so that a name listed twice cannot
-// stand for another one.
+// Returns whether each key of one side equals another key of the other side, so that a name listed
+// twice cannot stand for two keys.
 bool equalKeys(
     const std::vector<Key>& keys, std::vector<Key> partners, const ValueEquality& sameValue)
 {

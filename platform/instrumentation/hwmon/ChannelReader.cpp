@@ -12,7 +12,8 @@ namespace {
 
 using Subfeature = sensors_subfeature_type;
 
-// The subfeatures of one feature type; `none` where the kernel's interface has no such.
+// The subfeatures of one feature type; `none` where the kernel's sysfs-interface defines no such
+// attribute.
 constexpr Subfeature none = SENSORS_SUBFEATURE_UNKNOWN;
 
 struct Subfeatures {
@@ -84,8 +85,8 @@ const sensors_subfeature* findSubfeature(const Feature& feature, Subfeature type
     return type == none ? nullptr : sensors_get_subfeature(feature.chip, feature.feature, type);
 }
 
-// Absent when there is no such attribute, when it cannot be read, and when a `compute` line or
-// a driver makes it something that is no number.
+// Returns nothing when there is no such attribute, when it cannot be read, and when its value,
+// after a `compute` line, is not a finite number.
 std::optional<double> valueOf(const Feature& feature, Subfeature type)
 {
     const sensors_subfeature* subfeature = findSubfeature(feature, type);
@@ -96,7 +97,7 @@ std::optional<double> valueOf(const Feature& feature, Subfeature type)
     return value;
 }
 
-// NaN when it is there but cannot be read.
+// Returns nothing when there is no such limit, and NaN when it cannot be read.
 std::optional<double> limitOf(const Feature& feature, Subfeature type)
 {
     if (findSubfeature(feature, type) == nullptr)
@@ -116,7 +117,7 @@ std::optional<bool> alarmOf(const Feature& feature, Subfeature type)
     return isSet(feature, type);
 }
 
-// libsensors does not know this attribute.
+// Reads the file, since libsensors has no subfeature for this attribute.
 std::optional<bool> enableOf(const Feature& feature)
 {
     std::ifstream attribute(

@@ -49,21 +49,22 @@ ChipList::Lock ChipList::lockPresent()
                 renew();
         }
         shared.lock();
-        // Empty when another thread's renewal has failed in between; then this one tries.
+        // The fingerprint is empty when a renewal by another thread failed meanwhile.
         if (!fingerprint_.empty())
             return shared;
     }
 }
 
-// REQUIRES: the list is locked for this thread alone.
+// REQUIRES: this thread holds the exclusive lock.
 void ChipList::renew()
 {
-    // libsensors gives up when a chip goes away while it is looking; soon after, it will not.
+    // libsensors fails when a chip disappears while it lists them; the next attempt may succeed.
     constexpr int maximumAttempts = 5;
     for (int attempt = 1; true; ++attempt) {
         fingerprint_.clear();
         sensors_cleanup();
-        // Taken before libsensors looks, so that a chip which comes meanwhile shows next time.
+        // The fingerprint is taken first: a chip that appears while libsensors lists the others
+        // changes it, and the next call lists them again.
         const std::string present = machineFingerprint();
         try {
             if (hasHwmon())
@@ -92,7 +93,8 @@ void ChipList::initialise(const SensorsConfiguration& configuration)
             std::string("libsensors cannot list the chips: ") + sensors_strerror(result));
 }
 
-// Chips come and go while the configuration stays: what was wrong before is not said again.
+// Reports the errors that the previous call did not have: each new list of chips comes with a new
+// reading of the same configuration.
 void ChipList::reportOnce(const std::vector<LibsensorsHooks::ParseError>& errors,
     const SensorsConfiguration& configuration)
 {

@@ -62,8 +62,8 @@ std::vector<Node> HwmonSource::nodes(NodeType type)
     for (const sensors_chip_name* chip : Hwmon::detectedChips()) {
         const auto folder = Hwmon::folderOf(*chip);
         std::vector<Node> found = nodesOf(*chip, type);
-        // Of a chip that went while it was listed, nothing is known for sure: not even the
-        // labels, by which sensors are named.
+        // A chip that disappeared while its features were listed is left out, since the labels,
+        // which name the sensors, may be incomplete.
         if (folder && folder == Hwmon::folderOf(*chip))
             std::move(found.begin(), found.end(), std::back_inserter(nodes));
     }
@@ -95,7 +95,8 @@ NodeReading HwmonSource::read(const Node& node)
     }
     const Hwmon::Channel channel = Hwmon::readChannel(feature);
     values.status = Hwmon::statusOf(channel);
-    // The number of a channel with a fault (an open thermistor, say) means nothing.
+    // The reading of a channel with a fault, such as an open diode, is not to be trusted (the
+    // kernel's sysfs-interface).
     if (!channel.hasFault)
         values.reading = channel.reading;
     values.lowerNonCritical = channel.limits.min;

@@ -11,7 +11,7 @@ namespace Vorn::Hwmon {
 
 namespace {
 
-// A configuration without end must not fill the memory or the log.
+// The bound keeps an endless configuration from filling the memory or the log.
 constexpr std::size_t maximumParseErrors = 20;
 
 std::atomic<std::vector<LibsensorsHooks::ParseError>*> collected{nullptr};
@@ -38,7 +38,7 @@ LibsensorsHooks::LibsensorsHooks()
 
 LibsensorsHooks::~LibsensorsHooks()
 {
-    // Somebody who set hooks of their own since then keeps them.
+    // Hooks that other code of the process has set meanwhile are kept.
     if (sensors_parse_error_wfn == collectParseError)
         sensors_parse_error_wfn = parseError_;
     if (sensors_fatal_error == throwFatalError)

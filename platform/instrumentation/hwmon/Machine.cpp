@@ -38,7 +38,7 @@ std::string firstLine(const fs::path& path)
     return line;
 }
 
-// Drivers may add and remove attributes while the chip stays.
+// Drivers may add and remove attributes of a registered chip.
 std::size_t attributesFingerprint(const fs::path& folder)
 {
     std::size_t sum = 0;
@@ -47,8 +47,9 @@ std::size_t attributesFingerprint(const fs::path& folder)
     return sum;
 }
 
-// A chip that is registered anew gets another inode. The times of a folder in sysfs say
-// nothing: they are those of the moment in which the kernel last made up the inode.
+// A chip that is registered anew gets another inode. The times of a folder in sysfs are no
+// criterion: the kernel sets them whenever it allocates the inode, which it may evict from its
+// cache.
 std::string chipFingerprint(const fs::path& folder)
 {
     struct stat status {};

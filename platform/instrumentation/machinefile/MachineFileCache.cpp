@@ -11,10 +11,10 @@ namespace Vorn {
 
 namespace {
 
-// A process serves one machine, a test a few.
+// A process uses one file as a rule, a test a few.
 constexpr std::size_t maximumFiles = 8;
 
-// A kilobyte for each of 65,535 sensors.
+// The bound allows a kilobyte for each of 65,535 sensors.
 constexpr std::size_t maximumBytes = std::size_t{64} << 20U;
 
 } // namespace

@@ -27,8 +27,8 @@ namespace Member = MachineFileMember;
 
 namespace {
 
-// The members of an object in the order of the text. The library's own object types keep one of the
-// members of the same name; here all stay, so that they can be refused.
+// The members of an object in the order of the text. The library's own object types keep one of
+// several members of the same name; this one keeps all, so that duplicates can be refused.
 template <typename Key, typename Value, typename... Rest>
 struct Members : nlohmann::ordered_map<Key, Value, Rest...> {
     using nlohmann::ordered_map<Key, Value, Rest...>::ordered_map;
@@ -38,8 +38,8 @@ struct Members : nlohmann::ordered_map<Key, Value, Rest...> {
 
 using Json = nlohmann::basic_json<Members>;
 
-// While it lives, the C library's functions follow the C locale on this thread: the parser reads
-// numbers by strtod(), which would expect a decimal comma in some locales of the process.
+// Sets this thread's locale to C during its lifetime: the parser reads numbers by strtod(), which
+// expects a decimal comma in some locales.
 class NumericLocale {
 public:
     NumericLocale() : locale_(newlocale(LC_ALL_MASK, "C", nullptr)), previous_(uselocale(locale_))
@@ -55,7 +55,7 @@ public:
     NumericLocale& operator=(const NumericLocale&) = delete;
 
 private:
-    locale_t locale_; // null when memory is short: the thread keeps its own then
+    locale_t locale_; // null when memory is exhausted: the thread keeps its locale
     locale_t previous_;
 };
 
@@ -101,7 +101,7 @@ std::string_view reasonOf(std::string_view message)
 // be many times that of the text.
 void requireShallow(std::string_view text)
 {
-    constexpr int maximumDepth = 5; // one more than the format has, whose refusal says more
+    constexpr int maximumDepth = 5; // one more than the format's: its own errors name the member
     int depth = 0;
     bool isInString = false;
     for (std::size_t at = 0; at < text.size(); ++at) {
@@ -119,7 +119,7 @@ void requireShallow(std::string_view text)
 
 Json parsed(std::string_view text)
 {
-    // The parser takes a NUL for the end of the text and would pass over what follows.
+    // The parser takes a NUL for the end of the text and would ignore what follows.
     if (const std::size_t nul = text.find('\0'); nul != std::string_view::npos)
         failAt(text, nul, "the file holds the character NUL");
     requireShallow(text);
@@ -135,7 +135,7 @@ Json parsed(std::string_view text)
     }
 }
 
-// One step of the way from the document to a value.
+// One step of the path from the document to a value.
 struct Place {
     const Place* parent = nullptr;
     std::string_view step = {};
