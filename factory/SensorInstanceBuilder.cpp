@@ -24,7 +24,7 @@ namespace {
 
 constexpr const char* operation = "makeSensorInstance";
 
-// The number by which the localised texts know this library.
+// The component number of this library in the localised texts.
 constexpr unsigned long resourceComponent = 2;
 
 // Captions and descriptions are truncated to one character less.
@@ -60,11 +60,11 @@ CMPIInstance* newSensorInstance(const CMPIBroker* broker, const CMPIObjectPath* 
     return instance;
 }
 
-// How an array that the broker cannot make is reported.
+// The report of an array that the broker cannot create.
 struct ArrayFailure {
     const char* statusText;
     const char* traceText;
-    std::optional<unsigned> exitingLine; // absent where none is written
+    std::optional<unsigned> exitingLine; // absent where no exit line is written
 };
 
 // The runs of blanks are part of the texts.
@@ -124,7 +124,7 @@ private:
             return;
         const std::vector<std::string> states = sensor_.getPossibleStates();
         if (static_cast<std::uint16_t>(states.size()) == 0)
-            return; // unlike codes, no labels are no property
+            return; // unlike an empty list of codes, it is not set
         if (!writer_.setTexts("PossibleStates", states, rc_))
             traceMessage(factoryModule(), operation, FactoryLines::possibleStatesFailed,
                 "Failed to create CMPIArray for PossibleStates");

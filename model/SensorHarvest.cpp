@@ -38,7 +38,7 @@ struct ScaledProperty {
     const char* refusal;
 };
 
-// In the order in which they are read.
+// The properties in the order in which they are read.
 constexpr std::array<ScaledProperty, 7> scaledProperties = {{
     {Properties::Reading, &Sensor::setCurrentReading, "Failed while setting Current Reading"},
     {Properties::LowerNonCritical, &Sensor::setLowerThresholdNonCritical,

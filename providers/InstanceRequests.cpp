@@ -26,7 +26,7 @@ void giveUp(const HandlerMarks& marks, const FailureLines& lines, const char* te
 }
 
 // Returns the instance with the key to the object manager. Returns false after it traced that there
-// is no such record; the request then ends with an open result.
+// is no such record; the result stays open.
 bool returnByKey(const RecordClass& served, const CMPIBroker* broker, const HandlerMarks& marks,
     const FailureLines& lines, const CMPIResult* rslt, const CMPIObjectPath* ref, CMPIString* key,
     const char** properties, CMPIStatus* status)
@@ -43,8 +43,8 @@ bool returnByKey(const RecordClass& served, const CMPIBroker* broker, const Hand
 }
 
 // Returns the instance whose object path equals the request's, for a path without the key. The
-// factory always harvests sensors, so that such a path never finds capabilities. Returns false as
-// above.
+// factory always harvests sensors, so that such a path never finds capabilities. Returns false
+// after it traced that the enumeration failed; the result stays open.
 bool returnByPath(const RecordClass& served, const CMPIBroker* broker, const HandlerMarks& marks,
     const FailureLines& lines, const CMPIResult* rslt, const CMPIObjectPath* ref,
     const char** properties, CMPIStatus* status)

@@ -145,7 +145,7 @@ CMPIStatus SensorElementCapabilities_EnumInstanceNames(
         });
     const bool isAnswered = end == WalkEnd::complete || walk.foundNoSensors();
     if (isAnswered || end == WalkEnd::reported)
-        request.marks().exit(); // after the other ends there is none
+        request.marks().exit(); // only these ends have an exit mark
     if (isAnswered)
         CMReturnDone(rslt);
     return status;

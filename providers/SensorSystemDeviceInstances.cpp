@@ -120,7 +120,7 @@ int sensorSystemDeviceCMPIInstances(const CMPIObjectPath* op, const char** prope
             out.push_back(
                 newAssociation(request.broker(), association, references, properties, keys.data()));
         });
-    // After the other ends there is no exit mark.
+    // Only these two ends have an exit mark.
     if (end == WalkEnd::complete || end == WalkEnd::withoutSystemPath)
         request.marks().exit();
     return end == WalkEnd::complete ? 0 : 1;
