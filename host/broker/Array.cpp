@@ -44,7 +44,7 @@ Array& Array::copiedTo(Arena& arena) const
 
 void Array::setElementAt(CMPICount position, const CMPIValue* value, CMPIType type)
 {
-    // A null suits any array, whatever type it claims.
+    // A null is accepted with any type.
     const Value given = Value::from(Arena::required(), value, type);
     set(position, given.type() == CMPI_null ? Value::null(type_) : given);
 }

@@ -12,7 +12,8 @@ namespace Host {
 
 namespace {
 
-// Whether the text has digits and separators where a date-time has them.
+// Returns whether digits and separators stand where DSP0004, section 5.2.4, has them. A colon in
+// place of the sign marks an interval.
 bool hasForm(std::string_view text)
 {
     constexpr std::string_view form = "00000000000000.000000+000";
@@ -27,7 +28,7 @@ bool hasForm(std::string_view text)
     return true;
 }
 
-// REQUIRES: these are digits.
+// Returns the number at the position. REQUIRES: its characters are digits.
 int number(std::string_view text, std::size_t position, std::size_t digits)
 {
     int value = 0;

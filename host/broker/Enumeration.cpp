@@ -21,7 +21,7 @@ CMPIData Enumeration::getNext()
         throw Refusal(CMPI_RC_NO_MORE_ELEMENTS, "the enumeration is at its end");
     const Value next = rest_.front();
     rest_ = rest_.subspan(1);
-    return next.data(); // made for the caller alone
+    return next.data(); // the enumeration does not use it again
 }
 
 const CMPIEnumerationFT Enumeration::functions = {

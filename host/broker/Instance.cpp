@@ -23,7 +23,7 @@ bool contains(NameList names, std::string_view name)
         [name](const String* known) { return equalNames(*known->text(), name); });
 }
 
-// Copies a list of texts that ends with a null; null itself is an empty list.
+// Copies a null-terminated list of texts; a null pointer is an empty list.
 NameList copied(Arena& arena, const char** names)
 {
     std::size_t count = 0;

@@ -21,7 +21,7 @@ void* LargeBlocks::do_allocate(std::size_t size, std::size_t alignment)
 {
     void* const block = upstream_->allocate(size, alignmentFor(size, alignment));
     if (size >= hugePage)
-        madvise(block, size, MADV_HUGEPAGE); // advice: without it, ordinary pages do
+        madvise(block, size, MADV_HUGEPAGE); // without it, pages have the usual size
     return block;
 }
 

@@ -17,7 +17,8 @@ std::string_view textOf(const char* text)
     return text == nullptr ? std::string_view{} : text;
 }
 
-// Empty also for a handle without an object: a message is not refused for it.
+// Returns an empty text for a handle without an object, too: the rest of the message is still of
+// use.
 std::string_view textOf(const CMPIString* string)
 {
     const String* const object = String::of(string);

@@ -26,7 +26,7 @@ std::string quoted(std::string_view text)
     return result += '"';
 }
 
-// The shortest text that reads back as the same number.
+// Returns the shortest text that converts back to the same number.
 std::string realText(const Value& value)
 {
     std::array<char, 32> buffer{};

@@ -37,7 +37,7 @@ Enumeration& enumerateInstances(const Broker& broker, const CMPIContext* context
 } // namespace
 
 const CMPIBrokerFT upcallFunctions = {
-    // The least that can be said, although getInstance is not offered.
+    // CMPI defines no lower capability than basic reading, although getInstance is not supported.
     .brokerCapabilities = CMPI_MB_BasicRead,
     .brokerVersion = CMPIVersion200,
     .brokerName = "sensor-profile",

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Values as providers pass them: an address and a type that says what stands there.
+// Converts values as providers pass them: an address, and the type of what it points to.
 
 #include "host/broker/Array.h"
 #include "host/broker/DateTime.h"
@@ -17,7 +17,7 @@ namespace Host {
 
 namespace {
 
-// The address need not be aligned.
+// Returns the pointer at an address, which need not be aligned.
 template <typename Pointer>
 Pointer pointerAt(const void* address) noexcept
 {
@@ -26,7 +26,7 @@ Pointer pointerAt(const void* address) noexcept
     return pointer;
 }
 
-// Returns a copy of the object whose handle stands at the address; null when there is no handle.
+// Returns a copy of the object whose handle is at the address; null when there is no handle.
 template <typename Self>
 Value copyOfObject(Arena& arena, const void* address, CMPIType type)
 {

@@ -28,7 +28,7 @@ constexpr std::string_view entityFor(char c)
     }
 }
 
-// Whether a byte is printable ASCII without an entity, as nearly all bytes are.
+// Holds for each byte whether it is printable ASCII that needs no entity, as nearly all bytes are.
 constexpr std::array<bool, 256> plainBytes = [] {
     std::array<bool, 256> plain{};
     for (unsigned byte = ' '; byte <= '~'; ++byte)

@@ -44,8 +44,8 @@ struct FreeParser {
 
 } // namespace
 
-// Builds the elements of one text from Expat's callbacks. An exception in a callback is kept while
-// Expat, which is C, returns, and thrown again after that.
+// Builds the elements of one text from Expat's callbacks. No exception passes through Expat, which
+// is written in C: it is stored and rethrown when the parser has returned.
 class DocumentReader {
 public:
     explicit DocumentReader(std::size_t maximumDepth)
@@ -86,7 +86,7 @@ private:
     {
         auto& reader = *static_cast<DocumentReader*>(self);
         if (reader.failure_)
-            return; // Expat finishes the tag it was at
+            return; // a stopped parser still finishes the current tag
         try {
             callback(reader);
         } catch (...) {
@@ -144,13 +144,13 @@ private:
             if (++attributeCount > maximumAttributes)
                 fail("more than " + std::to_string(maximumAttributes) + " attributes",
                     Outcome::requestNotValid);
-        // The outermost element is kept whatever it is called.
+        // The outermost element is kept whatever its name.
         if (unknownDepth_ != 0 || (root_ && !isKnown(name))) {
             ++unknownDepth_;
             return;
         }
         Element::Position place = position();
-        ++place.offset; // that of the name
+        ++place.offset; // the offset of the name
         Element& opened =
             root_ ? open_.back()->children_.emplace_back(name, place) : root_.emplace(name, place);
         for (std::size_t at = 0; at < attributeCount; ++at)
@@ -166,7 +166,7 @@ private:
             open_.pop_back();
     }
 
-    // Of what Expat is reading.
+    // Returns the position of the current event.
     Element::Position position() const
     {
         return {XML_GetCurrentLineNumber(parser_.get()),
@@ -184,7 +184,7 @@ private:
     std::size_t maximumDepth_;
     std::optional<Element> root_;
     std::vector<Element*> open_;   // from the outermost to the innermost
-    std::size_t unknownDepth_ = 0; // of the elements that are left out
+    std::size_t unknownDepth_ = 0; // the depth within an unknown element
     std::size_t elements_ = 0;
     std::exception_ptr failure_;
 };

@@ -27,7 +27,8 @@ void writeOne(std::string& out, const Value& value)
     out += "</VALUE>";
 }
 
-// Appends the property's element without its value. Returns where that belongs.
+// Appends the property's element without its value. Returns the offset at which the value is to be
+// inserted.
 std::size_t writeFrame(std::string& out, std::string_view name, CMPIType valueType,
     const ClassDeclaration* declared, const ObjectSelection& selection)
 {

@@ -115,7 +115,7 @@ void appendNumber(std::string& out, Number number)
     out.append(buffer.data(), std::to_chars(buffer.begin(), buffer.end(), number).ptr);
 }
 
-// Appends the shortest text that reads back as the same number, with the decimal point that
+// Appends the shortest text that converts back to the same number, with the decimal point that
 // DSP0004 requires.
 template <typename Number>
 void appendReal(std::string& out, Number number)

@@ -29,7 +29,8 @@ const Element& messageOf(const Element& root)
     return message;
 }
 
-// The single request, which is not looked into when there are several or it is of another kind.
+// Returns the single request. Throws RequestError for several requests and for other kinds of
+// messages, without reading their contents.
 const Element& requestOf(const Element& message)
 {
     const Element& request = message.child({"SIMPLEREQ", "MULTIREQ", "SIMPLEEXPREQ", "MULTIEXPREQ",

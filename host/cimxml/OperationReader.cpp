@@ -37,13 +37,13 @@ public:
                 refuse(std::string(form.name) + " needs " + described(static_cast<P>(at)));
     }
 
-    // Returns null when the parameter was not given, or without a value.
+    // Returns the value of a parameter; null when the parameter was not given or has no value.
     const Element* operator[](P parameter) const
     {
         return values_[static_cast<std::size_t>(parameter)];
     }
 
-    // Returns the same; throws when the element is of another kind.
+    // Returns the value of a parameter, or null. Throws when the value is another element.
     const Element* get(P parameter, std::string_view kind) const
     {
         const Element* const value = (*this)[parameter];
@@ -100,7 +100,7 @@ private:
         isGiven_[at] = true;
         values_[at] = element.findChild({"VALUE", "VALUE.ARRAY", "VALUE.REFERENCE", "INSTANCENAME",
             "CLASSNAME", "QUALIFIER.DECLARATION", "CLASS", "INSTANCE", "VALUE.NAMEDINSTANCE"});
-        // Some clients name no class by an empty name.
+        // Some clients send an empty name in place of no class.
         if (values_[at] != nullptr && values_[at]->is("CLASSNAME") &&
             values_[at]->attribute("NAME").empty())
             values_[at] = nullptr;

@@ -61,7 +61,7 @@ constexpr std::array<OperationForm, 22> forms = {{
     {Kind::closeEnumeration, "CloseEnumeration", {P::enumerationContext}, nothing, nothing},
 }};
 
-// In the order of Parameter.
+// The names in the order of Parameter.
 constexpr std::array<std::string_view, parameterCount> parameterNames = {"AssocClass", "ClassName",
     "ContinueOnError", "DeepInheritance", "EnumerationContext", "FilterQuery",
     "FilterQueryLanguage", "IncludeClassOrigin", "IncludeQualifiers", "InstanceName", "LocalOnly",

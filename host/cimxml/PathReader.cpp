@@ -16,8 +16,8 @@ namespace Host::CimXml {
 
 namespace {
 
-// Keys of a path whose class is not known; those of other classes are bounded by the class. Each is
-// compared with all before it.
+// Bounds the keys of a path whose class is not known, since each is compared with all before it. A
+// known class bounds the keys itself.
 constexpr std::size_t maximumUndeclared = 1000;
 
 // Returns the type that a KEYVALUE itself names; CMPI_null for a number of any type.

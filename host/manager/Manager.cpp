@@ -60,7 +60,8 @@ void report(const ProviderRegistration& provider, const Refusal& refusal)
             refusal.what());
 }
 
-// Calls the providers in turn and returns the objects of all.
+// Calls the providers in turn. Returns the objects of all; throws the first failure when there are
+// none.
 template <typename Ask>
 CollectedResult askEach(const Routing::Registrations& providers, const Ask& ask)
 {
@@ -81,7 +82,8 @@ CollectedResult askEach(const Routing::Registrations& providers, const Ask& ask)
     return found;
 }
 
-// The objects that references finds are of the association class itself.
+// Returns the association for an operation on references, whose result class is the class of the
+// association itself.
 Manager::Association ofReferences(const Manager::Association& association)
 {
     return {association.resultClass, nullptr, association.role, nullptr};
@@ -149,7 +151,7 @@ const Instance& Manager::getInstance(
     return *found.instances().front();
 }
 
-// Asks for what an association leads to, and drops what is not of the result class.
+// Calls the association providers. Returns those of their objects that are of the result class.
 template <typename Ask>
 CollectedResult Manager::askAssociations(const ObjectPath& source, const Association& association,
     const char* resultClass, const Ask& ask) const

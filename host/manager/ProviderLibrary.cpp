@@ -22,7 +22,7 @@ constexpr CMPIVersion oldestVersion = 100;
     throw std::runtime_error(file + ": " + reason);
 }
 
-// Calls the cleanup of each MI, also after one has refused. Returns false when the library is to
+// Calls the cleanup of each MI, also after one of them failed. Returns false when the library is to
 // stay loaded.
 template <typename MIs>
 bool cleanUpAll(const MIs& mis, Context& context)
@@ -97,7 +97,7 @@ bool ProviderLibrary::cleanUp() noexcept
         const bool associationsDone = cleanUpAll(associationMIs_, request.context());
         return instancesDone && associationsDone;
     } catch (const std::exception&) {
-        return false; // what did not clean up may still be in use
+        return false; // what was not cleaned up may still be in use
     }
 }
 

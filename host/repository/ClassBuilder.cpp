@@ -18,7 +18,7 @@ bool isInherited(const Qualifier& qualifier)
     return qualifier.flavor().isInherited;
 }
 
-// Appends what the element inherits and does not give a value of its own.
+// Appends the inherited qualifiers that the element does not specify itself.
 void inherit(QualifierList& own, const QualifierList& inherited)
 {
     for (const Qualifier& above : inherited)
@@ -26,7 +26,7 @@ void inherit(QualifierList& own, const QualifierList& inherited)
             own.push_back({above.declaration, above.value, true});
 }
 
-// Returns the property as a subclass has it that does not override it.
+// Returns the property as a subclass inherits it that does not override it.
 std::shared_ptr<const PropertyDeclaration> inherited(
     const std::shared_ptr<const PropertyDeclaration>& property)
 {

@@ -20,7 +20,8 @@ namespace {
 
 namespace peg = tao::pegtl;
 
-// The state of the actions: the file, its declarations and what its includes are compiled with.
+// The state of the actions: the declarations of a file, and what the files that it includes are
+// compiled with.
 struct Unit {
     Compiler& compiler;
     Namespaces& namespaces;
@@ -32,7 +33,7 @@ struct Unit {
 void include(Unit& unit, const Literal& argument)
 {
     const auto file = unit.includeStack.back().parent_path() / argument.text;
-    std::error_code noSuchFile; // which compileFile reports
+    std::error_code noSuchFile; // compileFile reports it
     for (const auto& including : unit.includeStack)
         if (std::filesystem::equivalent(including, file, noSuchFile))
             throw peg::parse_error(argument.text + " includes itself", argument.position);
@@ -48,7 +49,7 @@ Namespace& openNamespace(Namespaces& namespaces, std::string_view written)
     return *namespaces.emplace_back(std::make_unique<Namespace>(name));
 }
 
-// Throws what the rule expected, at the place where it does not match.
+// Throws an error that names what the rule expected, at the position where it does not match.
 template <typename Rule>
 struct Control : peg::normal<Rule> {
     template <typename Input>
