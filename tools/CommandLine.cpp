@@ -82,7 +82,7 @@ ExitCode run(int argc, const char* const* argv)
     CLI::App tool(
         "Shows the hardware sensors of this machine as CIM clients see them.", "sensorctl");
     tool.set_version_flag("--version", versionText(), "Print the version and exit");
-    tool.require_subcommand(0, 1); // none is complained of here, in plainer words
+    tool.require_subcommand(0, 1); // runChosen() reports a missing command in plainer words
     tool.get_formatter()->label("SUBCOMMAND", "COMMAND");
     tool.get_formatter()->column_width(columnOfDescriptions);
     tool.footer(footer);

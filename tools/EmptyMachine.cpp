@@ -15,7 +15,7 @@ namespace {
 
 struct Look {
     std::size_t count = 0;
-    std::string nameless; // a sensor without a description, which no provider accepts
+    std::string nameless; // the path of a sensor without a description, which no provider accepts
 };
 
 Look lookAtMachine()

@@ -29,8 +29,8 @@ struct Parts {
     std::string_view keys; // what follows the dot
 };
 
-// Removes the text up to the first delimiter and returns what stands before it. Removes and
-// returns nothing when there is no delimiter.
+// Removes the text up to and including the first delimiter. Returns the part before it; an empty
+// text, and removes nothing, when there is no delimiter.
 std::string_view takeBefore(std::string_view& text, char delimiter)
 {
     const auto place = text.find(delimiter);
@@ -138,7 +138,7 @@ std::optional<Number> numberIn(std::string_view text)
     return number;
 }
 
-// Returns nothing for a text that is neither a number nor a boolean.
+// Returns the value of an unquoted text; nothing when it is neither a number nor a boolean.
 std::optional<Host::Value> plainValue(std::string_view text)
 {
     if (const auto number = numberIn<std::uint64_t>(text))

@@ -14,7 +14,7 @@ namespace Tools {
 
 namespace {
 
-// The provider's value of a reading or limit that is no number or does not fit.
+// The value that the provider reports for a reading or limit that is not a number or does not fit.
 constexpr std::int64_t unrepresentable = std::numeric_limits<std::int32_t>::min();
 
 constexpr std::uint64_t noContact = 12;

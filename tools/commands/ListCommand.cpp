@@ -51,7 +51,7 @@ public:
         if (className_ == sensorClass)
             checkMachineIsEmpty();
         else
-            countSensors(); // throws when providers found nothing because they cannot read it
+            countSensors(); // throws for an unreadable machine, of which providers return nothing
         if (display_.isJson())
             writeJson(out, className_, {});
         if (className_ == sensorClass)

@@ -82,8 +82,8 @@ void requireReadable(const std::string& file)
             : file);
 }
 
-// Returns the model files of the machine that is served, from the environment, which the options
-// have set.
+// Returns the model files of the machine that is served, from the environment variables that the
+// options have set.
 std::vector<std::string> modelFiles()
 {
     std::vector<std::string> files;
@@ -96,15 +96,15 @@ std::vector<std::string> modelFiles()
     return files;
 }
 
-// Writes the first line of the log. Throws std::runtime_error when it cannot be written: a
-// server does not start without a log. It continues when the log fails later.
+// Writes the first line of the log. Throws std::runtime_error when it cannot be written: a server
+// does not start without a log. A running server continues when the log fails.
 void beginLog(const std::string& text, Output& out)
 {
     report({"beginLog", "ServeCommand", __LINE__}, text);
     const std::string problem = Host::Http::logProblem();
     if (problem.empty())
         return;
-    // Where standard error is the log, it takes no error message either.
+    // Where the log is standard error, the message cannot be written either.
     if (::getenv("RYNLOG_LOG") == std::string("stderr")) {
         out.write("sensorctl: " + problem + "\n");
         out.flush();
@@ -112,9 +112,9 @@ void beginLog(const std::string& text, Output& out)
     throw std::runtime_error(problem);
 }
 
-// Keeps the memory of an answer for the next one: to map it again page by page takes a quarter of
-// the time that its objects take. Each arena keeps up to 8 MiB, so that there must not be one for
-// each connection.
+// Has the allocator keep the memory of an answer for the next one: mapping it again page by page
+// takes a quarter of the time that its objects take. Each arena keeps up to 8 MiB, so that their
+// number is limited to that of the workers.
 void keepFreedMemory(std::size_t workers)
 {
     ::mallopt(M_ARENA_MAX, static_cast<int>(workers));
@@ -163,7 +163,7 @@ public:
         options_.complete(parser());
         logToStandardError();
         source_.selectMachine();
-        const Signals signals; // before there are threads
+        const Signals signals; // before any thread starts
         keepFreedMemory(options_.http.workers);
         const auto endpoints = endpointsFor(options_);
         const Protection protection(options_);
@@ -187,7 +187,7 @@ public:
         if (serve(server, protection, signals, options_.gracePeriod))
             return ExitCode::success;
         complain("requests were still running at the end of the grace period");
-        // The destructor of the server would wait for them.
+        // The destructor of the server would wait for the requests that still run.
         ::_exit(static_cast<int>(ExitCode::failure));
     }
 

@@ -1,7 +1,7 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
 // The C library returns widths only in a UTF-8 locale, which a server may not have. These ranges
-// are those of Unicode's East_Asian_Width (W and F) and of marks without a width of their own.
+// are those of Unicode's East_Asian_Width (W and F) and of marks without a width.
 
 #include "tools/output/Utf8.h"
 

@@ -47,7 +47,7 @@ std::vector<std::size_t> Table::columnWidths(std::size_t width) const
 void Table::appendLine(std::string& text, const std::vector<Cell>& cells,
     const std::vector<std::size_t>& widths, bool isColored) const
 {
-    std::size_t blanks = 0; // owed before the next text
+    std::size_t blanks = 0; // to be written before the next text
     for (std::size_t i = 0; i < cells.size(); ++i) {
         const std::string shown = i == 0 ? cutToWidth(cells[i].text, widths[i]) : cells[i].text;
         const std::size_t padding = widths[i] - displayWidth(shown);
