@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// What the requests of the two association classes cost, over the number of sensors and, for
+// Measures the requests of the two association classes over the number of sensors and, for
 // ZUMLO_SensorSystemDevice, of computer systems.
 
 #include "bench/Handle.h"
@@ -27,7 +27,7 @@ constexpr const char* CapabilitiesClass = "ZUMLO_SensorEnabledLogicalElementCapa
 constexpr const char* ElementCapabilities = "ZUMLO_SensorElementCapabilities";
 constexpr const char* SystemDevice = "ZUMLO_SensorSystemDevice";
 
-// So many computer systems behind the broker.
+// Answers up-calls with the given number of computer systems.
 class Systems : public Host::BrokerUpcalls {
 public:
     explicit Systems(std::int64_t count) : count_(count) {}
@@ -63,7 +63,8 @@ private:
     std::int64_t count_;
 };
 
-// The association's own instances. Arguments: sensors, systems.
+// Measures the enumeration of an association's own instances. Its arguments are the numbers of
+// sensors and of systems.
 template <typename Handler>
 void enumerateAssociation(benchmark::State& state, const char* className, const Handler& handler)
 {
@@ -92,9 +93,9 @@ void enumerateInstances(benchmark::State& state, const char* className)
     });
 }
 
-// ---- From one object to the others ----
+// ---- Objects associated with one object ----
 
-// `objects` is the size of the answer.
+// Measures a request along an association. `objects` is the number of objects in the answer.
 template <typename Handler>
 void associate(benchmark::State& state, const char* sourceClass, const char* associationClass,
     std::int64_t objects, const Handler& handler)

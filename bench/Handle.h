@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// One request after another to a provider, each in a request of the embedded broker.
+// Measures the calls of a provider, each in a request of the embedded broker.
 
 #pragma once
 
@@ -25,9 +25,10 @@ inline void reportPerObject(benchmark::State& state, std::int64_t objects)
         benchmark::Counter::kIsIterationInvariantRate | benchmark::Counter::kInvert);
 }
 
-// On a machine of as many sensors as the first range says. `create` is the provider's factory,
-// `upcalls` (null for none) what it finds behind the broker, `objects` the size of the answer:
-// another answer is an error, not a measurement. The request's end is measured with the request.
+// Runs the handler on a machine whose number of sensors is the first range. `create` is the
+// provider's factory, `upcalls` answers its up-calls (null for none), and `objects` is the number
+// of objects in the answer; any other number ends the benchmark with an error. The measured time
+// includes the end of the request.
 template <typename Create, typename Handler>
 void handle(const Create& create, Host::BrokerUpcalls* upcalls, const char* className,
     std::int64_t objects, benchmark::State& state, const Handler& handler)

@@ -6,7 +6,7 @@
 
 int main(int argc, char** argv)
 {
-    // Without the settings of the person who measures.
+    // The settings of the environment do not reach the benchmarks.
     RynLog::configure({6000, "off", "off"});
     benchmark::Initialize(&argc, argv);
     if (benchmark::ReportUnrecognizedArguments(argc, argv))

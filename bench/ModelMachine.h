@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// A machine of any number of sensors, as a model file in a temporary folder.
+// A machine with any number of sensors, described by a model file in a temporary folder.
 
 #pragma once
 
@@ -21,13 +21,13 @@ public:
         : environment_(
               "VORN_INSTRUMENTATION", "model:" + folder_.write("model.json", content(sensors)))
     {
-        // A file that has just changed is parsed at each request; what is measured is the
-        // requests after that.
+        // A file that has just changed is parsed at each request; the measurement begins after
+        // that.
         std::this_thread::sleep_for(std::chrono::milliseconds(100));
         Vorn::Instrumentation().selectNode(Vorn::NodeLexicon::NodeType::Temperature);
     }
 
-    // The device identifier of a sensor in the middle.
+    // Returns the device identifier of a sensor in the middle of the file.
     static std::string someDeviceID(std::int64_t sensors)
     {
         const std::string number = std::to_string(sensors / 2);

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// What the requests of ZUMLO_NumericSensor cost, and where their time goes.
+// Measures the requests of ZUMLO_NumericSensor, and the steps of an enumeration by themselves.
 
 #include "bench/Handle.h"
 #include "bench/ModelMachine.h"
@@ -56,10 +56,10 @@ void GetInstance(benchmark::State& state)
             return mi->ft->getInstance(
                 mi, request.context().handle(), result.handle(), ref.handle(), nullptr);
         });
-    reportPerObject(state, state.range(0)); // it harvests all of them
+    reportPerObject(state, state.range(0)); // the request harvests all sensors
 }
 
-// ---- Where the time of EnumInstances goes ----
+// ---- The steps of EnumInstances ----
 
 void Harvest(benchmark::State& state)
 {
@@ -72,7 +72,7 @@ void Harvest(benchmark::State& state)
     reportPerObject(state, state.range(0));
 }
 
-// Harvest and index: what a factory does before it is asked for anything.
+// Measures a factory's constructor, which harvests the sensors and indexes the records.
 void Records(benchmark::State& state)
 {
     const ModelMachine machine(state.range(0));
@@ -122,7 +122,7 @@ void TracePointOff(benchmark::State& state)
     TracePoint(state, {6000, "off", "off"});
 }
 
-// With the default settings: messages only, to the system log.
+// Uses the default settings: messages only, to the system log.
 void TracePointBelowLevel(benchmark::State& state)
 {
     TracePoint(state, {6000, "syslog", "off"});

@@ -1,7 +1,7 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// What `sensorctl serve` costs: clients that ask again and again, each on a connection of its
-// own, and the same request within this process beside it. Prints tables.
+// Measures `sensorctl serve` under the requests of several clients, each with a connection of its
+// own, and compares it with the same request within this process. Prints tables.
 //
 //     bench_server [seconds for each line of the table]
 
@@ -68,8 +68,8 @@ void check(const Testing::HttpReply& reply, std::int64_t instances)
         throw std::runtime_error("a request failed: " + reply.body.substr(0, 500));
 }
 
-// Reads an answer to its end without keeping it, since what a client does with it is not the
-// server's cost. How many bytes came.
+// Reads an answer to its end without keeping it, since the client's work is not to be measured.
+// Returns the number of bytes.
 std::size_t skim(HttpClient& client)
 {
     std::string last = client.receiveSome();
@@ -96,7 +96,7 @@ struct Load {
     std::int64_t instances; // of the answer
 };
 
-// One connection, one request after another. The first one is not counted, but looked at.
+// Sends one request after another on one connection. The first answer is checked and not measured.
 Durations askUntil(Clock::time_point end, std::uint16_t port, const Load& load)
 {
     HttpClient client(port);
@@ -145,7 +145,7 @@ void printLoads(Seconds time)
     }
 }
 
-// The same answer from the provider in this process, as objects.
+// Has the provider in this process return the same instances as objects.
 void enumerateHere(const Host::Broker& broker, CMPIInstanceMI& mi, std::size_t sensors)
 {
     Host::Request request(broker);
@@ -173,7 +173,7 @@ void printComparison()
     Durations here;
     Durations there;
     std::size_t bytes = 0;
-    for (int i = 0; i < rounds; ++i) { // in turn, so that both meet the same machine
+    for (int i = 0; i < rounds; ++i) { // alternately, for the same load of the machine
         auto begin = Clock::now();
         enumerateHere(broker, mi, sensors);
         here.push_back(Milliseconds(Clock::now() - begin).count());

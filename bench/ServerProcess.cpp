@@ -23,7 +23,7 @@ struct CloseDescriptor {
     ~CloseDescriptor() { ::close(descriptor); }
 };
 
-// What the program writes before it waits for clients.
+// Returns the first line, which the program writes when it is ready.
 std::string readLine(int descriptor)
 {
     std::string line;
@@ -37,7 +37,7 @@ std::string readLine(int descriptor)
     const std::string program = SENSOR_PROFILE_BINARY_DIR "/bin/sensorctl";
     std::vector<std::string> words = {program, "serve", "--port=0", "--address=127.0.0.1"};
     if (::geteuid() == 0)
-        words.emplace_back("--user=root"); // nobody else can read the machine's model
+        words.emplace_back("--user=root"); // only root can read the machine's model
     std::vector<char*> arguments;
     for (std::string& word : words)
         arguments.push_back(word.data());

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// `sensorctl serve` as a process of its own, on the machine that the environment names.
+// Runs `sensorctl serve` as a child process, for the machine that VORN_INSTRUMENTATION selects.
 
 #pragma once
 
@@ -13,7 +13,7 @@
 
 namespace Bench {
 
-// Throws std::runtime_error when there is no such process or it says something else than expected.
+// Throws std::runtime_error when the process does not start or its output is not the expected one.
 class ServerProcess {
 public:
     ServerProcess();
@@ -22,10 +22,10 @@ public:
     ServerProcess& operator=(const ServerProcess&) = delete;
 
     std::uint16_t port() const { return port_; }
-    // From its making until it can be asked.
+    // Returns the time from the start of the process until it accepts requests.
     std::chrono::nanoseconds startUp() const { return startUp_; }
 
-    // In KiB, as the kernel counts them.
+    // Both return KiB, as /proc shows them.
     std::size_t residentMemory() const { return memory("VmRSS:"); }
     std::size_t peakMemory() const { return memory("VmHWM:"); }
 

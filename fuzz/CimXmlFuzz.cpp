@@ -1,7 +1,7 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Whatever bytes a request holds, the reader gives an operation, a RequestError or a Refusal; and
-// a path it read and the writer wrote, it reads back as the same.
+// For any bytes of a request, the reader returns an operation or throws a RequestError or a
+// Refusal, and a path that was read is the same after it was written and read again.
 
 #include "host/broker/Broker.h"
 #include "host/broker/ObjectPath.h"
@@ -62,7 +62,7 @@ std::optional<Operation> tryRead(std::string_view text)
     return std::nullopt;
 }
 
-// The objects of an operation make a response that is itself well-formed, though no request.
+// The response to an operation is well-formed XML, and no request.
 void requireWellFormedResponse(std::string_view request, const Operation& operation)
 {
     Host::CimXml::ResponseWriter writer(Message(request), operation.kind, classes(),

@@ -1,7 +1,7 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Whatever a head and a body say, they give a call in order or an error with a status of its own;
-// and what is read of a password file or of credentials ends within bounds.
+// Any head and body yield a valid call or an error with an HTTP status, and any password file and
+// credentials are read within bounds.
 
 #include "host/cimxml/Message.h"
 #include "host/cimxml/RequestError.h"
@@ -24,7 +24,7 @@ struct Request {
     std::string_view body;
 };
 
-// As a server splits it, without a server's care.
+// Splits a request into head and body, without the checks of a server.
 Request split(std::string_view text)
 {
     const auto next = [&text] {

@@ -1,7 +1,7 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Whatever bytes a model file holds, the reader gives nodes or a std::runtime_error; and what
-// it read and the writer wrote, it reads back as the same.
+// For any bytes of a model file, the reader returns nodes or throws std::runtime_error, and nodes
+// that were read are the same after they were written and read again.
 
 #include "platform/instrumentation/machinefile/MachineFileReader.h"
 #include "platform/instrumentation/machinefile/MachineFileWriter.h"
