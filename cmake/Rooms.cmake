@@ -2,8 +2,8 @@
 # that every include line names the room it reaches into.
 
 # The presets compile several files of a target as one, in a fraction of the time; only `coverage`
-# compiles each by itself. FILES_APART is for targets whose files use the same names, each for
-# something of its own.
+# compiles each by itself. FILES_APART is for targets whose files define the same names in unnamed
+# namespaces.
 
 # sensor_profile_room(NAME [FILES_APART] SOURCES ... [USES public libraries ...]
 #                     [PRIVATELY private libraries ...])
@@ -29,20 +29,19 @@ function(sensor_profile_test name)
     set_target_properties(${name} PROPERTIES UNITY_BUILD OFF)
   endif()
   add_test(NAME ${name} COMMAND ${name})
-  # The settings of the person who runs the tests must not reach them.
+  # The settings of the environment must not reach the tests.
   set(environment VORN_INSTRUMENTATION= RYNLOG_LOG=off RYNLOG_TRACE=off LC_ALL=C.UTF-8)
   set_tests_properties(${name} PROPERTIES
     ENVIRONMENT "${environment};${test_ENVIRONMENT}"
     TIMEOUT 300)
 endfunction()
 
-# What every test executable is compiled with, and so the precompiled headers too.
+# Adds an executable with the options of all tests, which their precompiled headers need, too.
 function(sensor_profile_test_executable name)
   add_executable(${name} ${ARGN})
   target_include_directories(${name} PRIVATE "${PROJECT_SOURCE_DIR}")
   target_link_libraries(${name} PRIVATE GTest::gmock GTest::gtest_main)
-  # What is measured and hardened is the rooms' code; optimising the tests only costs time, and
-  # without it there is no fortifying.
+  # Optimising the tests would only take time, and _FORTIFY_SOURCE needs optimisation.
   target_compile_options(${name} PRIVATE -O0 -U_FORTIFY_SOURCE)
   target_compile_definitions(${name} PRIVATE
     SENSOR_PROFILE_SOURCE_DIR="${PROJECT_SOURCE_DIR}"

@@ -18,7 +18,7 @@ add_link_options(-Wl,-z,relro,-z,now)
 if(CMAKE_CXX_COMPILER_ID STREQUAL "GNU")
   add_compile_options(-fno-gnu-unique)
   if(CMAKE_UNITY_BUILD)
-    # GCC takes files that are compiled as one for headers.
+    # GCC takes the files of a batch for headers.
     add_compile_options(-Wno-subobject-linkage)
   endif()
 endif()
@@ -33,7 +33,7 @@ elseif(CMAKE_BUILD_TYPE STREQUAL "Release")
   add_compile_options(-U_FORTIFY_SOURCE -D_FORTIFY_SOURCE=2)
 endif()
 
-# The counters that guide a fuzzer through the rooms.
+# The instrumentation that guides the fuzzers.
 if(SENSOR_PROFILE_FUZZ)
   add_compile_options(-fsanitize=fuzzer-no-link)
 endif()

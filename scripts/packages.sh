@@ -1,8 +1,8 @@
 # Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 # shellcheck shell=bash disable=SC2034
 
-# The Debian packages that building and checking needs, and their installation. Sourced by
-# `run` and `check`.
+# The Debian packages that building, checking and measuring need, and their installation. Sourced by
+# `run`, `check`, `bench/run` and `scripts/coverage`.
 
 build_packages=(
   g++ cmake ninja-build
@@ -26,18 +26,18 @@ bench_packages=(
   libbenchmark-dev
 )
 
-# The packages of the list that are not installed, one a line.
+# Prints the packages of the list that are not installed, one per line.
 missing_packages() {
   local package
   for package in "$@"; do
-    # A line for each architecture it is installed for.
+    # dpkg-query prints a line for each architecture.
     dpkg-query --show --showformat='${db:Status-Status}\n' "$package" 2>/dev/null |
       grep --quiet --line-regexp installed || echo "$package"
   done
 }
 
-# Installs what is missing of the list, with sudo when not root. All output goes to standard
-# error, so that it never mixes with what the caller prints.
+# Installs the missing packages of the list, with sudo when not root. All output goes to standard
+# error, so that it does not mix with the output of the caller.
 install_packages() {
   local missing as_root=()
   mapfile -t missing < <(missing_packages "$@")
@@ -51,7 +51,7 @@ install_packages() {
     as_root=(sudo)
   fi
   echo "Installing ${missing[*]}" >&2
-  # A machine that has just started may be updating itself.
+  # A machine that has just started may hold the lock while it updates itself.
   "${as_root[@]}" apt-get update --quiet=2 >&2 &&
     "${as_root[@]}" env DEBIAN_FRONTEND=noninteractive \
       apt-get -o DPkg::Lock::Timeout=300 install --yes --quiet=2 --no-install-recommends "${missing[@]}" >&2
