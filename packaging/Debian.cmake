@@ -38,12 +38,11 @@ set(CPACK_DEBIAN_TOOL_DESCRIPTION "hardware sensors as CIM instances: tool and s
 sensorctl shows the fans, voltages and temperatures of a computer as CIM
 clients see them, and serves them to such clients over HTTP where no other
 object manager runs.")
-set(CPACK_DEBIAN_TOOL_PACKAGE_CONTROL_EXTRA
-  debian/conffiles debian/postinst debian/prerm debian/postrm)
-list(TRANSFORM CPACK_DEBIAN_TOOL_PACKAGE_CONTROL_EXTRA PREPEND "${CMAKE_CURRENT_LIST_DIR}/")
 
 foreach(component IN ITEMS provider tool)
   string(TOUPPER ${component} name)
+  file(GLOB CPACK_DEBIAN_${name}_PACKAGE_CONTROL_EXTRA
+    "${CMAKE_CURRENT_LIST_DIR}/debian/${component}/*")
   set(folder doc/${CPACK_DEBIAN_${name}_PACKAGE_NAME})
   install(FILES debian/copyright DESTINATION "${CMAKE_INSTALL_DATADIR}/${folder}"
     COMPONENT ${component}-debian EXCLUDE_FROM_ALL)

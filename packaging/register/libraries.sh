@@ -26,6 +26,19 @@ is_same_folder() { [ "$(readlink -f "$1")" = "$(readlink -f "$2")" ]; }
 
 is_our_link() { [ -L "$1" ] && [ "$(readlink "$1")" = "$library_folder/${1##*/}" ]; }
 
+# Until 0.2 the computer system's library had this name. Packages link it to the one of today when
+# they are upgraded.
+former_library=libComputerSystemProvider.so
+
+has_former_link() {
+  local link=$used_folder/$former_library
+  is_our_link "$link" || { [ -L "$link" ] && [ "$link" -ef "$library_folder/${libraries[1]}" ]; }
+}
+
+unlink_former_library() {
+  if has_former_link; then step rm "$used_folder/$former_library"; fi
+}
+
 is_foreign() { { [ -e "$1" ] || [ -L "$1" ]; } && ! is_our_link "$1"; }
 
 link_libraries() {
@@ -50,7 +63,7 @@ has_links() {
   for each in "${libraries[@]}"; do
     if is_our_link "$used_folder/$each"; then return; fi
   done
-  return 1
+  has_former_link
 }
 
 unlink_libraries() {
@@ -58,6 +71,7 @@ unlink_libraries() {
   for each in "${libraries[@]}"; do
     if is_our_link "$used_folder/$each"; then step rm "$used_folder/$each"; fi
   done
+  unlink_former_library
 }
 
 remind_of_folder() {

@@ -40,6 +40,7 @@ openpegasus_register() {
   done
   remove_modules
   step cimmof -n root/PG_InterOp "$registration"
+  unlink_former_library
 }
 
 openpegasus_remove() {

@@ -75,6 +75,7 @@ sfcb_register() {
   mapfile -t outdated < <(outdated_classes)
   [ ${#outdated[@]} -eq 0 ] || step rm "${outdated[@]}"
   step sfcbrepos "${staging[@]}" -f
+  unlink_former_library
 }
 
 # With a namespace, that one; else all.

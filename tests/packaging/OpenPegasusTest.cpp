@@ -103,6 +103,25 @@ TEST_F(OpenPegasusTest, LinksTheLibrariesIntoTheFolderOfProviders)
     EXPECT_THAT(links(), IsEmpty());
 }
 
+TEST_F(OpenPegasusTest, ReplacesTheLinkOfTheLibrarysFormerName)
+{
+    addFormerLink();
+    mustRun({"register"});
+    EXPECT_THAT(
+        links(), ElementsAre("libSensorProfileComputerSystem.so", "libSensorProfileProvider.so"));
+    addFormerLink();
+    mustRun({"remove"});
+    EXPECT_THAT(links(), IsEmpty());
+}
+
+TEST_F(OpenPegasusTest, LeavesALibraryOfTheFormerNameAlone)
+{
+    folder_.write("providers/libComputerSystemProvider.so", "another one");
+    mustRun({"register"});
+    mustRun({"remove"});
+    EXPECT_THAT(links(), ElementsAre("libComputerSystemProvider.so"));
+}
+
 TEST_F(OpenPegasusTest, RefusesToTakeThePlaceOfAnotherLibrary)
 {
     folder_.write("providers/libSensorProfileComputerSystem.so", "another one");

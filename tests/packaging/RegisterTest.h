@@ -111,6 +111,14 @@ protected:
         return "rm " + path("providers/" + name);
     }
 
+    // Puts the link there that a registration of 0.2 made, which an upgrade leaves without a
+    // target.
+    void addFormerLink() const
+    {
+        std::filesystem::create_symlink(library("libComputerSystemProvider.so"),
+            path("providers/libComputerSystemProvider.so"));
+    }
+
     // What a message begins with when the step after so many done ones fails.
     static std::string failureAt(std::size_t done, const Lines& steps)
     {

@@ -139,4 +139,21 @@ TEST(RegistrationMofTest, SaysWhatTheEmbeddedManagerKnows)
     EXPECT_THAT(registrations, UnorderedElementsAreArray(embeddedTable()));
 }
 
+std::vector<std::string> matches(const std::string& text, const char* pattern)
+{
+    const std::regex group(pattern);
+    return {std::sregex_token_iterator(text.begin(), text.end(), group, 1), {}};
+}
+
+// OpenPegasus replaces a class only by one of a higher version.
+TEST(RegisteredClassesTest, HaveTheVersionOfTheProduct)
+{
+    for (const std::string name : {"sensor-profile.mof", "sensor-profile-computer-system.mof"}) {
+        const std::string text = Testing::contentOf(SENSOR_PROFILE_SOURCE_DIR "/schema/" + name);
+        const auto versions = matches(text, R"re(\bVersion\("([^"]*)"\))re");
+        EXPECT_THAT(versions, testing::Each(SENSOR_PROFILE_VERSION)) << name;
+        EXPECT_EQ(versions.size(), matches(text, "\nclass (\\w+)").size()) << name;
+    }
+}
+
 } // namespace RegistrationTests

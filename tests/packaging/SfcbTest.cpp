@@ -97,6 +97,19 @@ TEST_F(SfcbTest, RemovesLinksThatAreLeftOfIt)
     EXPECT_THAT(links(), IsEmpty());
 }
 
+// An upgrade of the package put it into the folder of the libraries.
+TEST_F(SfcbTest, RemovesTheLinkOfTheLibrarysFormerName)
+{
+    const std::string former = library("libComputerSystemProvider.so");
+    for (const std::string action : {"register", "remove"}) {
+        fs::create_symlink(systemLibrary_, former);
+        mustRun({action, "--provider-folder", library()});
+        EXPECT_FALSE(fs::exists(fs::symlink_status(former))) << action;
+        fs::remove(former);
+    }
+    EXPECT_THAT(filesBelow(library()), ElementsAre(systemLibrary_, sensorLibrary_));
+}
+
 // As somebody to whom permissions apply: root without the right to pass them over.
 TEST_F(SfcbTest, RefusesAStageThatCannotBeLookedInto)
 {

@@ -3,9 +3,9 @@
 // Requests in files with the responses that are expected, for each operation and its options.
 //
 // NAME.xml holds a request, the line `<!-- response -->` and the response with the elements on
-// lines of their own. In both @SYSTEM@ stands for the kernel's host name and @CONTEXT@ for the
-// context of the open enumeration. `<!-- after OTHER.xml -->` in a request: the request of the
-// other file is sent before it.
+// lines of their own. In both @SYSTEM@ stands for the kernel's host name, @VERSION@ for that of the
+// product and @CONTEXT@ for the context of the open enumeration. `<!-- after OTHER.xml -->` in a
+// request: the request of the other file is sent before it.
 
 #include "host/cimxml/OperationTable.h"
 #include "platform/utilities/ProviderUtilities.h"
@@ -52,8 +52,9 @@ class OperationFilesTest : public testing::TestWithParam<std::string> {
 protected:
     std::string filledIn(const std::string& text) const
     {
-        return Testing::replaced(
-            Testing::replaced(text, "@SYSTEM@", Vorn::getSystemName()), "@CONTEXT@", context_);
+        std::string filled = Testing::replaced(text, "@SYSTEM@", Vorn::getSystemName());
+        filled = Testing::replaced(std::move(filled), "@VERSION@", SENSOR_PROFILE_VERSION);
+        return Testing::replaced(std::move(filled), "@CONTEXT@", context_);
     }
 
     std::string responseTo(const std::string& request)
