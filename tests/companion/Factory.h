@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The library's entry point, as an object manager finds it.
+// The factory function that the library exports.
 
 #pragma once
 

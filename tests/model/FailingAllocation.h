@@ -8,7 +8,7 @@
 
 namespace Testing {
 
-// While it lives, allocations of exactly this size fail on this thread.
+// Makes allocations of exactly this size fail on this thread during its lifetime.
 class FailingAllocation {
 public:
     explicit FailingAllocation(std::size_t size);

@@ -7,7 +7,7 @@
 
 namespace Testing {
 
-// The setter that refuses its value, by name; none when empty.
+// The name of the setter that returns false; none when empty.
 extern std::string refusedSetter;
 
 // The setters called so far, in order.

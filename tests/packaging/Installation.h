@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// What `cmake --install` makes of this build.
+// Installations of this build by `cmake --install`.
 
 #pragma once
 
@@ -14,18 +14,18 @@
 namespace Testing {
 
 // Runs `cmake --install` with these further arguments and variables. Throws std::runtime_error with
-// what it said when it fails.
+// its output when it fails.
 void install(const std::vector<std::string>& arguments,
     const std::map<std::string, std::string>& environment = {});
 
 // The files below a folder, sorted and relative to it.
 std::vector<std::string> filesBelow(const std::filesystem::path& folder);
 
-// A whole installation that was moved from the prefix it was made for to another one. Made once
-// for the process, since it only reads the build.
+// Returns the folder of a complete installation that was moved from its prefix to another one. The
+// tests of a process share it.
 const std::filesystem::path& movedInstallation();
 
-// Returns the path of one of its files.
+// Returns the path of a file of movedInstallation().
 inline std::string installedFile(const std::string& name)
 {
     return (movedInstallation() / name).string();

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Requests of the instances of an association: pairs of what its two references refer to.
+// Requests for the instances of an association, whose two references form pairs.
 
 #pragma once
 
@@ -14,7 +14,7 @@ namespace Testing {
 
 struct AssociationClass {
     const char* name;
-    const char* one; // the first reference
+    const char* one; // the name of the first reference
     const char* other;
     InstanceFactory createInstanceMI;
     AssociationFactory createAssociationMI;
@@ -30,7 +30,7 @@ protected:
     {
     }
 
-    // A path of the association with any values for its keys.
+    // Returns a path of the association with the given values of its keys.
     Host::ObjectPath& pairPath(const Host::Value& one, const Host::Value& other)
     {
         Host::ObjectPath& made = path(association_.name);
@@ -49,7 +49,7 @@ protected:
         return AssociationTest::pairs(association_.one, association_.other);
     }
 
-    // GetInstance with a result of its own.
+    // Calls GetInstance with a result of its own. Returns the pairs that were delivered.
     std::vector<std::string> got(const Host::ObjectPath& ref)
     {
         Host::CollectedResult found;

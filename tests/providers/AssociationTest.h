@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Requests of an association provider, from the object manager's side.
+// Requests to an association provider, as an object manager sends them.
 
 #pragma once
 
@@ -20,7 +20,7 @@ constexpr const char* SystemClass = "ZUMLO_ComputerSystem";
 constexpr const char* CapabilitiesClass = "ZUMLO_SensorEnabledLogicalElementCapabilities";
 constexpr const char* CapabilitiesID = "ZUMLO:SensorEnabledLogicalElementCap1";
 
-// The rest of what a client says when it asks for associated objects.
+// The optional parameters of a request for associated objects.
 struct Filter {
     const char* associationClass = nullptr;
     const char* resultClass = nullptr;
@@ -29,7 +29,8 @@ struct Filter {
     const char** properties = nullptr;
 };
 
-// The broker, with functions of the test's own behind the instances it makes. One at a time.
+// The broker with a function table of the test for the instances that it makes. Only one may exist
+// at a time.
 class BrokerWithInstances {
 public:
     BrokerWithInstances(const CMPIBroker* broker, const CMPIInstanceFT& functions)
@@ -57,7 +58,7 @@ private:
     CMPIBroker broker_;
 };
 
-// Harvested as C, B, A.
+// The sensors in the order of the harvest: C, B, A.
 inline const std::vector<ScriptedNode> ThreeSensors = {
     {Vorn::NodeLexicon::NodeType::Temperature, "/3", "C", Vorn::NodeReading{}},
     {Vorn::NodeLexicon::NodeType::Voltage, "/2", "B", Vorn::NodeReading{}},
@@ -160,7 +161,7 @@ protected:
         EXPECT_EQ(textOf(status.msg), text);
     }
 
-    // An answer of nothing, closed or left open.
+    // Expects an empty result, closed or open.
     void expectNothing(bool isDone)
     {
         EXPECT_TRUE(answer_.paths().empty());
@@ -169,7 +170,8 @@ protected:
         EXPECT_EQ(answer_.isDone(), isDone);
     }
 
-    // Nothing but paths of associations, each with this machine's name and both its references.
+    // Expects that all delivered objects are paths of the association with this machine's name and
+    // both references.
     void expectAssociationPaths(const std::string& association, const std::string& nameSpace)
     {
         EXPECT_TRUE(answer_.instances().empty());
@@ -181,7 +183,7 @@ protected:
         }
     }
 
-    // The value that tells the object from its like: a sensor's, a system's or a capabilities'.
+    // Returns the value of the key that identifies a sensor, a system or capabilities.
     static std::string nameOf(const Host::ObjectPath& end)
     {
         for (const char* const key : {"DeviceID", "InstanceID", "Name"})
@@ -190,7 +192,7 @@ protected:
         return "nameless";
     }
 
-    // What was delivered, by its names.
+    // Returns the names of the delivered objects.
     std::vector<std::string> delivered() const
     {
         std::vector<std::string> names;
@@ -201,7 +203,7 @@ protected:
         return names;
     }
 
-    // The associations of an answer, as pairs of the names of what two references refer to.
+    // Returns the associations of a result as pairs of the names of the objects that they refer to.
     static std::vector<std::string> pairs(
         const Host::CollectedResult& answer, const char* one, const char* other)
     {
@@ -215,7 +217,7 @@ protected:
         return found;
     }
 
-    // The same of what was delivered.
+    // Returns the pairs of the delivered associations.
     std::vector<std::string> pairs(const char* one, const char* other) const
     {
         return pairs(answer_, one, other);

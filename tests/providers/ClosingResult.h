@@ -14,7 +14,7 @@ inline bool isExitMark(const LogLine& line)
     return line.function == "markProviderExit";
 }
 
-// A result that reads the log at the moment in which it is closed. One at a time.
+// A result that records the log when it is closed. Only one may exist at a time.
 class ClosingResult {
 public:
     explicit ClosingResult(const LogCapture& capture) : capture_(capture)

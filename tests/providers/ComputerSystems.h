@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The object manager's other provider, which the association with computer systems asks.
+// The provider of computer systems, which answers the up-calls of the association with them.
 
 #pragma once
 
@@ -31,9 +31,9 @@ public:
     explicit ComputerSystems(std::vector<std::string> systems) : names(std::move(systems)) {}
 
     std::vector<std::string> names;
-    std::string nameSpace = "root/cimv2"; // of the paths it hands out
-    CMPIrc refusal = CMPI_RC_OK;          // what it answers with, if not systems
-    bool isMixed = false;                 // hands out elements of all other types between them
+    std::string nameSpace = "root/cimv2"; // of the paths that it returns
+    CMPIrc refusal = CMPI_RC_OK;          // the code of its failure
+    bool isMixed = false;                 // returns elements of all other types between them, too
     std::vector<Upcall> calls;
 
     Host::Enumeration& enumerateInstanceNames(

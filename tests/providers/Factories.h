@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The library's entry points, as an object manager finds them.
+// The factory functions that the library exports.
 
 #pragma once
 

@@ -6,10 +6,10 @@
 
 namespace Testing {
 
-// What enumerations that fail put into the status.
+// The code that failing enumerations set in the status.
 inline constexpr CMPIrc FailedEnumeration = CMPI_RC_ERR_ACCESS_DENIED;
 
-// What the enumeration of the paths of capabilities returns; other than 0 without any path.
+// The result of the enumeration of the paths of capabilities, which adds no path when it is not 0.
 inline int capabilitiesPathsResult = 0;
 
 } // namespace Testing

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Requests to a provider, for a broker that fails them.
+// Requests to an association provider, for a broker that injects faults.
 
 #pragma once
 
@@ -18,7 +18,7 @@ namespace Testing {
 
 using SourceMaker = std::function<Host::ObjectPath&(const Host::Request&)>;
 
-// A path with one text key, which is enough for a source.
+// Returns a function that makes a path with at most one text key, which is enough for a source.
 inline SourceMaker pathMaker(
     const std::string& className, const std::string& key = {}, const std::string& text = {})
 {
@@ -54,7 +54,7 @@ inline SourceMaker sensorMaker(const std::string& deviceID)
     };
 }
 
-// The kinds of requests to the provider with these factories.
+// Makes the kinds of requests to the provider with these factories.
 struct RequestKinds {
     InstanceFactory instanceFactory;
     AssociationFactory associationFactory;
@@ -108,7 +108,7 @@ struct RequestKinds {
     }
 
 private:
-    // A request that `call` makes through the MI of the factory.
+    // Returns a kind of request that `call` sends to the MI of the factory.
     template <typename Factory, typename Call>
     static RequestKind kind(
         const std::string& name, const SourceMaker& source, Factory make, Call call)
@@ -125,7 +125,7 @@ struct End {
     const char* className;
 };
 
-// A reference that is there refers to an object of its class.
+// Expects a reference that is set to refer to an object of its class.
 inline void expectEnd(const Host::Value* value, const End& end)
 {
     if (value == nullptr || value->isNull())
@@ -134,8 +134,8 @@ inline void expectEnd(const Host::Value* value, const End& end)
     EXPECT_EQ(value->path()->className(), end.className) << end.role;
 }
 
-// What holds of every answer, whatever failed: all objects are of a class that the association
-// has to do with, and what an association refers to is of the right class.
+// Expects what holds for every result, whatever failed: all objects are of the association or of
+// one of its ends, and each association refers to objects of the right classes.
 inline void expectWellFormed(
     const FaultyRequest& request, const char* association, const std::vector<End>& ends)
 {
@@ -160,7 +160,7 @@ inline void expectWellFormed(
         << request.status.rc;
 }
 
-// A machine of two sensors and whatever systems there are.
+// A machine with two sensors and the given systems.
 class AssociationFaultTest : public FaultTest {
 protected:
     explicit AssociationFaultTest(std::vector<std::string> systems)
@@ -174,7 +174,7 @@ protected:
 
     struct TracedRequest {
         std::unique_ptr<FaultyRequest> request;
-        Lines lines; // the provider's own
+        Lines lines; // the trace lines of the provider
     };
     TracedRequest runTraced(const RequestKind& kind, const Fault& fault)
     {
@@ -183,7 +183,7 @@ protected:
         return traced;
     }
 
-    // That what the broker reports of a namespace or of its characters is not the status.
+    // Expects that failures to read a namespace or its characters do not change the status.
     void expectNamespacesLeaveTheStatus(const RequestKind& kind)
     {
         const auto unread = runWithLast(kind, BrokerCall::getNameSpace, FaultManner::nullResult);
@@ -191,8 +191,8 @@ protected:
         EXPECT_EQ(runWithLast(kind, BrokerCall::getCharPtr)->status.rc, CMPI_RC_OK) << kind;
     }
 
-    // That the first association of an enumeration of names is made after its ends were given
-    // their namespace in this order.
+    // Expects that an enumeration of names sets the namespaces of both ends in this order before it
+    // makes the first association.
     void expectNameSpacesInOrder(const RequestKind& names, const std::string& association,
         const std::string& first, const std::string& second)
     {
@@ -207,7 +207,8 @@ protected:
         EXPECT_EQ(*(made - 1), second);
     }
 
-    // That values are read whole, which AddressSanitizer watches, and say what they say.
+    // Expects references to have the right values. The faulty broker reads each CMPIValue
+    // completely, so that AddressSanitizer reports one that is shorter.
     void expectWholeValues(const RequestKind& names, const RequestKind& instances, const End& end)
     {
         const auto paths = run(names, std::vector<Fault>{});
@@ -220,7 +221,7 @@ protected:
         expectEnd(objects->answer.instances()[0]->property(end.role), end);
     }
 
-    // A status of its own, and an answer that is not ended.
+    // Expects a failed status with this text, and a result that is not closed.
     static void expectBrokenOff(const FaultyRequest& request, const std::string& statusText)
     {
         EXPECT_EQ(request.status.rc, CMPI_RC_ERR_FAILED);
@@ -228,7 +229,7 @@ protected:
         EXPECT_FALSE(request.answer.isDone());
     }
 
-    // An answer as if nothing had been there; the failure is told in a string and a message only.
+    // Expects an empty result with status OK; only a string and a trace message report the failure.
     static void expectEmptyAnswer(
         const FaultyRequest& request, const std::string& lastString, const BrokerMessage& message)
     {

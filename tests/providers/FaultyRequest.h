@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// A request to a provider whose broker fails it.
+// A request to a provider whose broker injects faults.
 
 #pragma once
 
@@ -16,7 +16,7 @@
 
 namespace Testing {
 
-// What is asked, of which object.
+// The operation of a request and its object path.
 struct RequestKind {
     std::string name;
     std::function<Host::ObjectPath&(const Host::Request&)> source;
@@ -30,7 +30,7 @@ inline std::ostream& operator<<(std::ostream& out, const RequestKind& kind)
     return out << kind.name;
 }
 
-// One request with a broker of its own choosing, and all that came of it.
+// Sends one request with the given broker, and holds its result, status and trace messages.
 class FaultyRequest {
 public:
     FaultyRequest(Host::Broker& broker, FaultyBroker& faulty, const RequestKind& kind)
@@ -49,7 +49,7 @@ public:
     }
 
     std::string message() const { return textOf(status.msg); }
-    // The last string the provider had made, and its last message to the broker's trace.
+    // Returns the last string that the provider created, "none" when there is none.
     std::string lastString() const { return strings_.empty() ? "none" : strings_.back(); }
     BrokerMessage lastMessage() const
     {
@@ -61,7 +61,7 @@ public:
     CMPIStatus status = {};
 
 private:
-    // Writes down the texts of the strings that are made while it lives.
+    // Records the texts of the strings that are created during its lifetime.
     class Strings {
     public:
         Strings(const CMPIBrokerEncFT* functions, std::vector<std::string>* texts)
@@ -92,10 +92,10 @@ private:
 
 class FaultTest : public ::testing::Test {
 protected:
-    // Runs the request with faults, all of which are to come true.
+    // Runs the request with faults, and expects all of them to occur.
     std::unique_ptr<FaultyRequest> run(const RequestKind& kind, const std::vector<Fault>& faults)
     {
-        faulty_.reset(); // the last one made is the one in force, so they end in turn
+        faulty_.reset(); // only the last one constructed is active: the old one is destroyed first
         faulty_ = std::make_unique<FaultyBroker>(broker_);
         for (const Fault& fault : faults)
             faulty_->plan(fault);
@@ -108,7 +108,8 @@ protected:
         return run(kind, std::vector<Fault>{fault});
     }
 
-    // Runs the request with a status of the last call of its kind, by default beside its result.
+    // Runs the request with a fault in the last call of the kind, by default an error status beside
+    // the result.
     std::unique_ptr<FaultyRequest> runWithLast(
         const RequestKind& kind, BrokerCall call, FaultManner manner = FaultManner::errorStatus)
     {
@@ -117,14 +118,14 @@ protected:
         return run(kind, {call, last, manner, CMPI_RC_ERR_ACCESS_DENIED});
     }
 
-    // How often the last request called the function of a path of the class.
+    // Returns how often the last request called this function of a path of the class.
     std::ptrdiff_t timesCalled(const std::string& call, const std::string& className) const
     {
         const std::vector<std::string>& calls = faulty_->pathCalls();
         return std::count(calls.begin(), calls.end(), call + " " + className);
     }
 
-    // How the first call of the kind can fail to deliver its object.
+    // The manners in which a call fails to return its object.
     static constexpr FaultManner Undelivered[] = {FaultManner::nullResult, FaultManner::handleless};
 
     Host::Broker broker_;

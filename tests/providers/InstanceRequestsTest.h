@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Requests of a provider that serves the instances of one class, from the object manager's side.
+// Requests to the instance provider of one class, as an object manager sends them.
 
 #pragma once
 

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The keys of the profile's classes, as an object manager knows them from its repository.
+// The keys of the profile's classes, which an object manager has in its repository.
 
 #pragma once
 

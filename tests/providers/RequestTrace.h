@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The trace lines of whole requests: what was written and what is expected, as
+// The trace lines of whole requests, written and expected, in this form:
 //
 //     SensorFactory 3000 makeSensorInstance(SensorFactory:269) ENTERING: makeSensorInstance() in
 //     SensorFactory [Line: 269]
@@ -26,10 +26,10 @@ inline std::string place(const std::string& function, const std::string& file, u
     return " " + function + "(" + file + (line ? ":" + std::to_string(line) : "") + ") ";
 }
 
-// One line as it was written.
+// Returns a log line in this form.
 std::string requestLine(const LogLine& line);
 
-// What a request writes to both channels, but for the lines of the harvest.
+// Returns the lines that a request writes to both channels, without those of the harvest.
 template <typename Request>
 Lines traceOf(const Request& request)
 {
@@ -85,13 +85,13 @@ inline std::string operationLine(const std::string& mark, const std::string& nam
            numbered(mark + ": " + name + "() in SensorFactory", line) + parameters;
 }
 
-// An operation of the factory.
+// Returns the expected lines of an operation of the factory.
 inline Lines operation(const std::string& name, unsigned entry = 0, unsigned exit = 0)
 {
     return {operationLine("ENTERING", name, entry), operationLine("EXITING", name, exit)};
 }
 
-// One that does not get to its exit.
+// Returns the expected lines of an operation that ends without its exit mark.
 inline Lines brokenOff(const std::string& name, unsigned entry = 0)
 {
     return {operationLine("ENTERING", name, entry)};
@@ -116,7 +116,7 @@ inline Lines counted()
         operationLine("EXITING", "getNumberOfInstances", 0, 4000)};
 }
 
-// The factory's construction with the maps it makes.
+// Returns the expected lines of the factory's constructor, with those of the maps that it fills.
 inline Lines builtFactory(const Lines& maps)
 {
     Lines inner;
@@ -127,7 +127,7 @@ inline Lines builtFactory(const Lines& maps)
     return around(operation("SensorFactory"), inner);
 }
 
-// The lines of the provider alone.
+// Returns only the lines of the provider.
 inline Lines ownLines(Lines lines)
 {
     std::erase_if(
@@ -135,7 +135,8 @@ inline Lines ownLines(Lines lines)
     return lines;
 }
 
-// The look-up of an association's target. `exit` is the line that its outcome has.
+// Returns the expected lines of the look-up of an association's target. `exit` is the line number
+// of its exit mark.
 inline Lines lookedUp(const std::string& association, const std::string& resultClass, unsigned exit)
 {
     const std::string names = " _RefLeftClass=" + association + " _RefRightClass=" + resultClass;

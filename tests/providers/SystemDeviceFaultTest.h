@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The requests of ZUMLO_SensorSystemDevice for a broker that fails them.
+// The requests of ZUMLO_SensorSystemDevice, for a broker that injects faults.
 
 #pragma once
 

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The calls of a broker that can fail, and how.
+// The calls of a broker that can fail, and the manners in which they fail.
 
 #pragma once
 
@@ -47,18 +47,18 @@ std::span<const BrokerCall> allBrokerCalls();
 std::string nameOf(BrokerCall call);
 
 enum class FaultManner {
-    // Nothing comes back: a null pointer, a null value, 0 or false. The call is not made.
+    // The call returns a null pointer, a null value, 0 or false, and has no effect.
     nullResult,
-    // An object comes back whose handle is null; its functions survive that.
+    // The call returns an object whose handle is null, which its functions accept.
     handleless,
-    // The call is made and its result comes back, but the status says that it failed. A call
-    // that answers with nothing but a status is not made.
+    // The call returns its result with a status that reports a failure. A call that returns nothing
+    // but a status has no effect.
     errorStatus,
-    // The call is made and succeeds; the object it was made on has no handle afterwards.
+    // The call succeeds; afterwards the object on which it was made has no handle.
     lostHandle,
 };
 
-// The manners in which a call can fail at all.
+// Returns the manners in which a call can fail.
 std::span<const FaultManner> mannersOf(BrokerCall call);
 std::string nameOf(FaultManner manner);
 

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The texts of calls in CIM-XML, in root/cimv2 unless it says otherwise.
+// The texts of calls in CIM-XML; the namespace is root/cimv2 by default.
 
 #pragma once
 
@@ -10,7 +10,7 @@
 
 namespace Testing {
 
-// With the namespace in two parts, of which the second is cimv2.
+// Returns a message with one call. The namespace has two components, of which the second is cimv2.
 inline std::string cimCall(const std::string& operation, const std::string& parameters = {},
     const std::string& firstName = "root")
 {
@@ -40,7 +40,7 @@ inline std::string cimInstanceName(
     return text + "</INSTANCENAME>";
 }
 
-// The fields that a server wants with a call of the operation, but for its length.
+// Returns the header fields that a server requires of a call, except for its length.
 inline std::string cimFields(const std::string& operation)
 {
     return "Host: localhost\r\nContent-Type: application/xml\r\nCIMOperation: MethodCall\r\n"
@@ -53,7 +53,7 @@ inline std::string lengthField(const std::string& body)
     return "Content-Length: " + std::to_string(body.size()) + "\r\n";
 }
 
-// A whole request of HTTP.
+// Returns a whole HTTP request.
 inline std::string cimRequest(const std::string& operation, const std::string& parameters = {},
     const std::string& moreFields = {})
 {

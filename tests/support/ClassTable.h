@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Classes for tests that need no repository.
+// Classes for tests without a repository.
 
 #pragma once
 

@@ -7,7 +7,8 @@
 
 namespace Testing {
 
-// Counts what is taken from the heap and not given back. In force while it lives.
+// Counts the bytes that are allocated and not freed. It is the default memory resource during its
+// lifetime.
 class CountingMemory : public std::pmr::memory_resource {
 public:
     CountingMemory() : before_(std::pmr::set_default_resource(this)) {}

@@ -25,7 +25,7 @@ inline std::string describeElements(const Host::Array& array)
     return "[" + text + "]";
 }
 
-// Such as `uint16 5`, `string "OK"` or `[uint16 0, uint16 1]`.
+// Returns the type and the value, such as `uint16 5`, `string "OK"` or `[uint16 0, uint16 1]`.
 inline std::string describe(const Host::Value& value)
 {
     if (value.isNull())
@@ -48,7 +48,7 @@ inline std::string describe(const Host::Value& value)
     }
 }
 
-// Such as `CurrentReading = sint32 41`, in the order in which they were set.
+// Returns texts such as `CurrentReading = sint32 41` in the order in which the values were set.
 inline std::vector<std::string> describe(const Host::NamedValues& values)
 {
     std::vector<std::string> lines;
@@ -65,7 +65,7 @@ inline std::vector<std::string> namesOf(const Host::NamedValues& values)
     return names;
 }
 
-// The property's value as text; "absent" when the instance does not have it.
+// Returns the property's value as text; "absent" when the instance does not have it.
 inline std::string property(const Host::Instance& instance, const char* name)
 {
     const Host::Value* const value = instance.property(name);

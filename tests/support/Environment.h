@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Sets an environment variable while it lives. Not for tests with other threads at work.
+// Sets an environment variable during its lifetime. REQUIRES: no other thread runs.
 
 #pragma once
 

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// What a shared library exports, as the linker's tools see it.
+// The names that a shared library exports, read by nm.
 
 #pragma once
 
@@ -24,7 +24,7 @@ inline std::string outputOf(const std::string& command)
     return output;
 }
 
-// The names in `nm`'s lines of value, type and name.
+// Returns the names in the output of nm, whose lines have value, type and name.
 inline std::vector<std::string> exportedNames(const std::string& library)
 {
     std::istringstream lines(outputOf("nm -D --defined-only '" + library + "'"));

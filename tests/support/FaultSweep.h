@@ -1,6 +1,7 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Runs a request once for every broker call it makes and every way that call can fail.
+// Runs a request once for each broker call that it makes and each manner in which that call can
+// fail.
 
 #pragma once
 
@@ -14,8 +15,8 @@
 
 namespace Testing {
 
-// `request` runs one whole request with the broker it is handed, in a scope of its own, and
-// checks what must hold whatever fails.
+// `request` runs one whole request with the given broker, in a scope of its own, and checks what
+// holds whatever fails.
 inline void sweepFaults(
     const Host::Broker& broker, const std::function<void(FaultyBroker&)>& request)
 {

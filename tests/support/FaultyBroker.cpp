@@ -31,7 +31,7 @@ const Table& realTable()
         Host::Instance::functions, Host::Enumeration::functions, Host::Result::functions));
 }
 
-// Returns the same table with calls interposed.
+// Returns the table with interposed calls.
 template <typename Table>
 const Table& watchedTable();
 
@@ -45,7 +45,7 @@ Handle* handleless()
     return &object;
 }
 
-// Whatever an object comes back in, its calls are watched from then on.
+// Interposes the calls of an object that a call returned; other types have none.
 template <typename Other>
 void watchObject(const Other&)
 {
@@ -126,8 +126,8 @@ void loseHandle(Handle* object, const Rest&...)
     const_cast<std::remove_const_t<Handle>*>(object)->hdl = nullptr;
 }
 
-// Replaces the address of a value by that of a copy of a whole CMPIValue. Texts are their own
-// address.
+// Replaces the address of a value by that of a copy of a whole CMPIValue. The address of a text
+// (CMPI_chars) stays.
 template <typename... Others>
 void copyValue(CMPIValue&, const Others&...)
 {
@@ -280,7 +280,7 @@ FaultyBroker::FaultyBroker(const Host::Broker& broker)
 {
     upcalls_.brokerName = broker.handle()->bft->brokerName;
     upcalls_.brokerCapabilities = broker.handle()->bft->brokerCapabilities;
-    // The embedded broker finds itself by the handle, so that calls can go through this one.
+    // The copy keeps the handle, by which the embedded broker is found.
     handle_.bft = &upcalls_;
     handle_.eft = &watchedTable<CMPIBrokerEncFT>();
     inForce = this;

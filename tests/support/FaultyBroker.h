@@ -1,12 +1,12 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// A broker that fails on demand: it stands between a provider and the embedded broker,
-// counts the calls of each kind, and makes the n-th call of a kind fail. It copies a whole
-// CMPIValue from each address of a property, an array element or a key, as some object managers do:
+// A broker that injects faults: it forwards the calls of a provider to the embedded broker, counts
+// those of each kind, and makes the n-th call of a kind fail. It copies a whole CMPIValue from the
+// address of each property, array element and key, as some object managers do, so that
 // AddressSanitizer reports a value that is shorter.
 //
-// A test runs the provider once to learn how many calls of each kind it makes, then once for
-// each of them with a fault planned:
+// A test runs the provider once to count its calls of each kind, and then once for each call with a
+// fault in it:
 //
 //     for (const BrokerCall call : allBrokerCalls())
 //         for (const FaultManner manner : mannersOf(call))
@@ -39,13 +39,13 @@ struct Fault {
     BrokerCall call;
     unsigned nth; // 1 is the first call of its kind
     FaultManner manner;
-    // What the status says; CMPI_RC_OK leaves it as the provider handed it over, or as the
-    // call left it.
+    // The code that is set in the status; CMPI_RC_OK leaves the status as the provider or the call
+    // set it.
     CMPIrc code = CMPI_RC_ERR_FAILED;
 };
 
-// In force on the thread it was made on, while it lives; the one made last counts. Objects
-// that came through it keep working after its end, without faults.
+// Active during its lifetime on the thread that constructed it; of several, the last one is active.
+// Objects that it returned stay usable after its destruction, without faults.
 class FaultyBroker {
 public:
     // The broker must outlive this object.
@@ -54,30 +54,30 @@ public:
     FaultyBroker(const FaultyBroker&) = delete;
     FaultyBroker& operator=(const FaultyBroker&) = delete;
 
-    // What the provider gets for its broker.
+    // Returns the broker to be given to the provider.
     const CMPIBroker* handle() const noexcept { return &handle_; }
-    // The same objects; calls made through them are counted and fail, too.
+    // Both return the same object with interposed functions, whose calls are counted and fail, too.
     const CMPIObjectPath* watch(const CMPIObjectPath* path) const;
     const CMPIResult* watch(const CMPIResult* result) const;
 
-    // Adds a fault. Counting goes on from where it stands.
+    // Adds a fault. The counts are not reset.
     void plan(const Fault& fault) { faults_.push_back(fault); }
-    // Forgets faults, counts and calls.
+    // Clears the faults, the counts and the calls.
     void reset();
 
     unsigned count(BrokerCall call) const;
-    // Every call in order.
+    // Returns all calls in order.
     const std::vector<BrokerCall>& calls() const noexcept { return calls_; }
-    // Every call of a path's function in order with the class of the path, such as
-    // "addKey ZUMLO_NumericSensor".
+    // Returns all calls of functions of paths in order with the class of the path, such as "addKey
+    // ZUMLO_NumericSensor".
     const std::vector<std::string>& pathCalls() const noexcept { return pathCalls_; }
-    // How many planned faults came true.
+    // Returns how many of the planned faults have occurred.
     unsigned fired() const noexcept { return fired_; }
 
-    // For the interposed functions: counts a call and says how it fails; null when it is to
-    // succeed, or when no faulty broker is in force.
+    // Counts a call of an interposed function. Returns its fault; null when it is to succeed or no
+    // faulty broker is active.
     static const Fault* arrived(BrokerCall call);
-    // The same for a function of a path.
+    // Does the same for a function of a path.
     static const Fault* arrived(BrokerCall call, const CMPIObjectPath* path);
 
 private:

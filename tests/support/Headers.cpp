@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The program that the tests' precompiled headers are made for.
+// The program that the precompiled headers of the tests belong to.
 
 int main()
 {

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// A client that sends exactly the bytes it is told to, and reads answers of HTTP/1.1.
+// A client that sends exactly the given bytes and parses HTTP/1.1 answers.
 
 #pragma once
 
@@ -20,7 +20,7 @@ struct HttpReply {
     std::map<std::string, std::string> fields; // by name in lower case
     std::string body;
 
-    // Empty when it is not there.
+    // Returns the value of a field; an empty text when there is none.
     std::string field(const std::string& name) const
     {
         const auto found = fields.find(name);
@@ -28,7 +28,7 @@ struct HttpReply {
     }
 };
 
-// Every failure and everything that exceeds the timeout throws std::runtime_error.
+// Every function throws std::runtime_error when it fails or exceeds the timeout.
 class HttpClient {
 public:
     static constexpr std::chrono::seconds timeout{20};
@@ -39,24 +39,25 @@ public:
     HttpClient& operator=(HttpClient&& other) noexcept;
 
     void send(std::string_view bytes);
-    // No more will be sent.
+    // Closes the sending direction of the connection.
     void endSending();
-    // False when the server does not take all.
+    // Returns false when the server does not receive all.
     bool trySend(std::string_view bytes);
 
-    // The next answer; interim ones are passed over.
+    // Returns the next final answer; interim answers are skipped.
     HttpReply receive();
-    // Whether an answer, or a part of one, comes within the time.
+    // Returns whether an answer, or a part of one, arrives within the time.
     bool hasReplyWithin(std::chrono::milliseconds time);
-    // The next bytes, at least one; empty at the end of the connection.
+    // Returns the next bytes, at least one; an empty text when the server has closed the
+    // connection.
     std::string receiveSome();
-    // Waits for the end of the connection; false when something comes instead.
+    // Waits until the server closes the connection. Returns false when data arrives instead.
     bool isClosed();
-    // Sends a reset when it is closed.
+    // Closes the connection with a reset.
     void closeHard();
 
 protected:
-    // As send and recv on the socket.
+    // Both return what send() and recv() on the socket return.
     virtual ::ssize_t write(const char* bytes, std::size_t count);
     virtual ::ssize_t read(char* bytes, std::size_t count);
 

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Captures what is written to the log and trace channels while it lives.
+// Captures the lines that are written to the log and trace channels during its lifetime.
 
 #pragma once
 
@@ -31,7 +31,7 @@ inline std::ostream& operator<<(std::ostream& out, const LogLine& line)
                << '(' << line.file << ':' << line.line << ") " << line.text;
 }
 
-// A line without its pointers: `setVector(Sensor:740) 3000 ENTERING: ... =PTR`.
+// Returns a line without its pointers, such as `setVector(Sensor:740) 3000 ENTERING: ... =PTR`.
 std::string withoutPointers(const LogLine& line);
 std::vector<std::string> withoutPointers(const std::vector<LogLine>& lines);
 
@@ -49,7 +49,7 @@ public:
     std::vector<LogLine> log() const { return lines("log"); }
     std::vector<LogLine> trace() const { return lines("trace"); }
 
-    // The kinds and line numbers of a function's log lines, such as `EXITING 737`.
+    // Returns the kinds and line numbers of a function's log lines, such as `EXITING 737`.
     std::vector<std::string> marksOf(const std::string& function) const;
 
 private:

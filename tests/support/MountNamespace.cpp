@@ -30,7 +30,7 @@ std::string& refusal()
     return text;
 }
 
-// An ordinary user becomes root of a user namespace, which may mount.
+// Returns the command. It maps an ordinary user to root of a user namespace, who may mount.
 std::vector<std::string> unshareCommand()
 {
     if (geteuid() == 0)
@@ -38,7 +38,7 @@ std::vector<std::string> unshareCommand()
     return {"unshare", "--user", "--map-root-user", "--mount"};
 }
 
-// What the command prints; empty when it ends well.
+// Returns why the command cannot mount; an empty text when it can.
 std::string complaintOf(const std::vector<std::string>& command)
 {
     std::string line;
@@ -97,7 +97,8 @@ void layOut(const fs::path& folder, const std::string& machine)
         throw std::runtime_error("cannot read " + manifest.string());
 }
 
-// Members are initialised in their order, so the tree is complete before it is bound.
+// Returns the folder after it has filled it: members are initialised in order, so that the tree is
+// complete before it is bound.
 const fs::path& filled(const fs::path& folder, const std::string& machine)
 {
     if (machine.empty())

@@ -1,8 +1,7 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Runs a test program in a mount namespace of its own, so that it can put a sysfs tree of its
-// making where the kernel's is, and a sensors configuration where the administrator's is,
-// without anybody else seeing it.
+// Runs a test program in a mount namespace of its own, in which it can mount a sysfs tree over that
+// of the kernel and a sensors configuration over that of the administrator.
 
 #pragma once
 
@@ -15,17 +14,17 @@
 
 namespace Testing {
 
-// Runs the program again inside `unshare`, or returns at once when it is inside already or no
-// namespace can be made. REQUIRES: called first in main(), with main's argument.
+// Executes the program again by `unshare`; returns when it runs in the namespace already or none
+// can be created. REQUIRES: called first in main(), with main's argument.
 void enterMountNamespace(char** argv);
 
-// Skips its tests, saying why, where no namespace can be made; fails them under CI.
+// Skips its tests with the reason where no namespace can be created; fails them in CI.
 class MountNamespaceTest : public testing::Test {
 protected:
     void SetUp() override;
 };
 
-// A file or folder bound over another one while it lives.
+// A bind mount of a file or folder over another one, which exists during its lifetime.
 class BindMount {
 public:
     BindMount(const std::filesystem::path& from, const std::filesystem::path& over);
@@ -55,7 +54,7 @@ public:
     void remove(const std::string& relative);
     void rename(const std::string& from, const std::string& to);
 
-    // A chip on the bus at the address, with no attribute but its name.
+    // Adds a chip on the bus at the address. Its only attribute is its name.
     void addChip(const std::string& folder, const std::string& name, const std::string& bus,
         const std::string& address);
 

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Runs tests inside a mount namespace of their own.
+// Runs the tests in a mount namespace of their own.
 
 #include "tests/support/MountNamespace.h"
 

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// What this process holds, as the kernel sees it.
+// The resources of this process, read from /proc.
 
 #pragma once
 
@@ -14,7 +14,7 @@
 
 namespace Testing {
 
-// Returns whether the process has the library in its memory.
+// Returns whether the process has mapped the library.
 inline bool isMapped(const std::string& library)
 {
     const std::string path = std::filesystem::canonical(library).string();

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// A request in the embedded broker, as a provider sees it, and what comes of it.
+// A request in the embedded broker, as a provider receives it, and its result.
 
 #pragma once
 
@@ -36,7 +36,7 @@ class ProviderTest : public ::testing::Test {
 protected:
     static constexpr const char* NameSpace = "root/cimv2";
 
-    // A path with text keys in the request's namespace.
+    // Returns a path with text keys; by default in the namespace of the requests.
     Host::ObjectPath& path(const char* className,
         const std::vector<std::pair<std::string, std::string>>& keys = {},
         const char* nameSpace = NameSpace)

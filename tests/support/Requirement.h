@@ -9,8 +9,8 @@
 
 namespace Testing {
 
-// Ends a test that cannot run here: `return cannotRun(...)`, also in SetUp. It is skipped, but
-// in CI, which is to run all, it fails.
+// Ends a test that cannot run here: `return cannotRun(...)`, also in SetUp. The test is skipped; in
+// CI, which runs all tests, it fails.
 inline void cannotRun(const std::string& reason)
 {
     if (std::getenv("CI") != nullptr)

@@ -1,7 +1,7 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// A machine made of nodes that a test writes down, with failures where the test wants them.
-// While it lives it is what Vorn::Instrumentation finds.
+// A machine whose nodes and failures a test defines. It is the source of Vorn::Instrumentation
+// during its lifetime.
 
 #pragma once
 

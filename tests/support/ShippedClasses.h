@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The classes of the embedded object manager, from the files it comes with.
+// The classes of the embedded object manager, compiled from the shipped files.
 
 #pragma once
 

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// A folder of the test's own, removed with all it holds.
+// A temporary folder, which is removed with its contents at the end of its lifetime.
 
 #pragma once
 
@@ -32,7 +32,7 @@ public:
 
     const std::filesystem::path& path() const { return path_; }
 
-    // Writes a file and returns where it is.
+    // Writes a file. Returns its path.
     std::string write(const std::string& name, const std::string& content) const
     {
         const auto file = path_ / name;

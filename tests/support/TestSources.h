@@ -1,7 +1,7 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Sources of the tests' own. A test that provides one is linked with the function that opens them
-// in place of the product's.
+// Sources that tests define. A test that provides one is linked with another openSource() in place
+// of the product's.
 
 #pragma once
 
@@ -15,7 +15,7 @@ namespace Testing {
 
 using SourceFactory = std::function<std::unique_ptr<Vorn::Source>()>;
 
-// Lets VORN_INSTRUMENTATION name a kind of source, or replaces it. Thread-safe.
+// Adds or replaces a kind of source that VORN_INSTRUMENTATION can name. Thread-safe.
 void provideSource(const std::string& scheme, SourceFactory factory);
 
 } // namespace Testing

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Files as texts, and what is asked of texts.
+// Functions that read files as texts and search texts.
 
 #pragma once
 
@@ -15,7 +15,7 @@
 
 namespace Testing {
 
-// Returns an empty text for a file that cannot be read.
+// Returns the content of a file; an empty text when it cannot be read.
 inline std::string contentOf(const std::filesystem::path& file)
 {
     std::ifstream in(file, std::ios::binary);

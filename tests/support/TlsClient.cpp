@@ -81,7 +81,7 @@ std::string TlsClient::version() const
 {
     for (;;) {
         const ::ssize_t got = ::gnutls_record_recv(session_.get(), bytes, count);
-        // TLS 1.3 brings messages of its own between the data.
+        // In TLS 1.3, messages of the protocol may arrive between the data.
         if (got != GNUTLS_E_AGAIN && got != GNUTLS_E_INTERRUPTED)
             return asSocketResult(got);
     }

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The same client, speaking TLS. It trusts anybody.
+// An HTTP client over TLS. It accepts any certificate.
 
 #pragma once
 
@@ -16,13 +16,13 @@ namespace Testing {
 
 class TlsClient : public HttpClient {
 public:
-    // The priorities say which versions it speaks. Throws std::runtime_error when the server
-    // speaks none of them.
+    // The priorities select the versions of TLS. Throws std::runtime_error when the server supports
+    // none of them.
     explicit TlsClient(std::uint16_t port, const std::string& priorities = "NORMAL");
 
-    // What the server's certificate says.
+    // Returns the subject of the server's certificate.
     std::string subject() const;
-    // Such as TLS1.3.
+    // Returns the negotiated version, such as TLS1.3.
     std::string version() const;
 
 protected:
@@ -42,7 +42,7 @@ private:
     std::unique_ptr<std::remove_pointer_t<gnutls_session_t>, Freeing> session_;
 };
 
-// A certificate for the name, and its key, as PEM files with these names and .crt and .key.
+// Writes a certificate for the name and its key as PEM files, whose names end in .crt and .key.
 void makeCertificate(const std::string& fileWithoutEnding, const std::string& name);
 
 } // namespace Testing

@@ -28,8 +28,8 @@ inline std::ostream& operator<<(std::ostream& out, const BrokerMessage& message)
     return out << message.level << ' ' << message.component << ": " << message.text;
 }
 
-// Another handle of a broker: records the trace messages that reach it. A message belongs to the
-// recorder that was made last for its broker. Used by one thread.
+// Records the trace messages of a broker through another handle of it. Of several recorders of a
+// broker, the last one records a message. Used by one thread.
 class TraceRecorder {
 public:
     explicit TraceRecorder(const CMPIBroker* broker) : handle_(*broker)
@@ -43,7 +43,7 @@ public:
 
     const CMPIBroker* handle() const { return &handle_; }
 
-    // The embedded broker's table with trace messages recorded.
+    // Returns the embedded broker's table with a slot that records trace messages.
     static const CMPIBrokerEncFT& functions()
     {
         static const CMPIBrokerEncFT table = [] {

@@ -1,7 +1,7 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// A machine with one node of each type that runs what a test says when a node is read, and that
-// counts the cursors over it. While it lives it is what Vorn::Instrumentation finds.
+// A machine with one node of each type that calls a function of the test when a node is read and
+// counts the cursors. It is the source of Vorn::Instrumentation during its lifetime.
 
 #pragma once
 
@@ -18,7 +18,7 @@
 
 namespace Testing {
 
-// Something thrown that no standard exception is a base of.
+// An exception that is not derived from std::exception.
 struct StrangeException {};
 
 class WatchedMachine {
@@ -43,7 +43,7 @@ private:
         unsigned most;
     };
 
-    // A cursor has one source of its own.
+    // Each cursor has a source of its own.
     class WatchedSource : public Vorn::Source {
     public:
         explicit WatchedSource(std::shared_ptr<Watch> watch) : watch_(std::move(watch))

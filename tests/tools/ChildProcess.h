@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Runs sensorctl, or another program, as a person or a script would.
+// Runs sensorctl or another program as a child process.
 
 #pragma once
 
@@ -20,7 +20,7 @@ inline const std::string sensorLibrary =
 inline const std::string systemLibrary =
     SENSOR_PROFILE_BINARY_DIR "/lib/libSensorProfileComputerSystem.so";
 
-// How a program ended, and what it wrote.
+// How a program ended, and its output.
 struct Ended {
     int code = -1;  // its exit code; -1 when a signal ended it
     int signal = 0; // the signal
@@ -30,22 +30,22 @@ struct Ended {
 
 struct RunOptions {
     std::string program = sensorctl;
-    // Beside LC_ALL=C and silent logs; no other setting of this process that matters to the
-    // tool reaches it.
+    // The variables beside LC_ALL=C and those that turn the logs off. The tool inherits no other
+    // variable that affects it.
     std::map<std::string, std::string> environment = {};
-    // Where standard output goes: into the result, to a file, nowhere because it is closed, or
-    // into a pipe that nobody reads.
+    // Standard output is captured, written to a file, closed, or a pipe without a reader.
     enum class Out { captured, file, closed, abandonedPipe } out = Out::captured;
     std::string outFile = {};
 };
 
 Ended run(const std::vector<std::string>& arguments, const RunOptions& options = {});
 
-// Starts a program with these variables and no others. Returns the number of the error, or 0.
+// Starts a program with exactly these environment variables. Returns an error number, or 0.
 int spawn(::pid_t& child, const std::string& program, const std::vector<std::string>& arguments,
     const std::map<std::string, std::string>& variables, const posix_spawn_file_actions_t& actions);
 
-// On a terminal of so many columns, which is where `out` comes from; standard error goes there too.
+// Runs sensorctl on a pseudo-terminal of that width. `out` holds what it writes there, to standard
+// error, too.
 Ended runOnTerminal(const std::vector<std::string>& arguments, unsigned short columns,
     const std::map<std::string, std::string>& environment = {{"TERM", "xterm"}});
 

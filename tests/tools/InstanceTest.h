@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Instances made by hand, for what looks at them.
+// An instance whose properties a test sets.
 
 #pragma once
 

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// A server with a small machine, and the request that its tests ask.
+// A server with a small machine, and the request that its tests send.
 
 #pragma once
 
@@ -19,7 +19,7 @@
 
 namespace Testing {
 
-// ann's is "secret", at the least cost.
+// The password of ann is "secret"; its hash has the least cost.
 inline const std::string userLine =
     "ann:$2b$04$abcdefghijklmnopqrstuu2r9OfJnfCsdneAXAGHnS4UpFFP8WIrW\n";
 inline const std::string asAnn = "Authorization: Basic YW5uOnNlY3JldA==\r\n";
@@ -56,7 +56,7 @@ protected:
         return file;
     }
 
-    // With certificates of these names.
+    // Returns arguments with a certificate for the name, which is made at its first use.
     std::vector<std::string> encrypted(
         const std::string& certificate, std::vector<std::string> arguments = {}) const
     {
@@ -67,7 +67,7 @@ protected:
         return withModel(arguments);
     }
 
-    // A run that must fail.
+    // Runs a server that is expected not to start.
     static Ended failing(std::vector<std::string> arguments)
     {
         arguments.insert(arguments.begin(), "serve");

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The servers that clients are tried on, one for each machine and each way to it.
+// The servers that clients are tested with, one for each machine and scheme.
 
 #pragma once
 
@@ -22,13 +22,13 @@
 
 namespace Testing {
 
-// With a certificate, and for clients that sign in as ann.
+// The options of a server with TLS whose clients sign in as ann.
 class Encryption {
 public:
     Encryption()
     {
         makeCertificate(file_, "localhost");
-        // ann's is "secret", at the least cost.
+        // The password of ann is "secret"; its hash has the least cost.
         passwords_ = folder_.write(
             "passwords", "ann:$2b$04$abcdefghijklmnopqrstuu2r9OfJnfCsdneAXAGHnS4UpFFP8WIrW\n");
         ::chmod(passwords_.c_str(), 0600);
@@ -48,7 +48,7 @@ private:
 
 using Place = std::tuple<std::string, std::string>; // a machine's name and a scheme
 
-// The options that say which machine.
+// Returns the options that select a machine.
 inline std::vector<std::string> optionsOf(const std::string& machine)
 {
     if (machine == "demonstration")
@@ -56,7 +56,7 @@ inline std::vector<std::string> optionsOf(const std::string& machine)
     return {};
 }
 
-// What all tests share: nothing that a client may do changes it.
+// The servers and results that all tests share, since no request changes them.
 class Machines {
 public:
     ServerProcess& server(const Place& place)
@@ -72,7 +72,7 @@ public:
         return servers_.try_emplace(place, options).first->second;
     }
 
-    // The objects of a class as the tool shows them.
+    // Returns the objects of a class as the tool prints them.
     const nlohmann::json& listed(const std::string& machine, const std::string& name)
     {
         nlohmann::json& instances = listed_[{machine, name}];

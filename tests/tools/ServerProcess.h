@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// `sensorctl serve` as a process of its own, which is killed where a test leaves it running.
+// Runs `sensorctl serve` as a child process, which the destructor kills if it still runs.
 
 #pragma once
 
@@ -19,8 +19,8 @@ namespace Testing {
 class ServerProcess {
 public:
     // Serves on any port unless the arguments name one, as the user who runs the tests unless they
-    // name another. The program may be another way to start the tool. Returns when clients can
-    // connect; throws std::runtime_error with what it said on standard error when it ends instead.
+    // name another. The program may be another one that starts the tool. Returns when clients can
+    // connect; throws std::runtime_error with its standard error when it ends instead.
     explicit ServerProcess(std::vector<std::string> arguments,
         const std::map<std::string, std::string>& environment = {},
         const std::string& program = sensorctl);
@@ -30,14 +30,15 @@ public:
 
     std::string output() const;
     std::string log() const;
-    // Of the first address it told of; with TLS, or without.
+    // Returns the port of the first address of the scheme that it printed.
     std::uint16_t port(const std::string& scheme = "http") const;
     ::pid_t id() const { return process_; }
 
     void signal(int number) const;
-    // Waits until the log holds the text; false when it does not for long.
+    // Waits until the log contains the text. Returns false after a timeout.
     bool waitForLog(const std::string& text) const;
-    // How it ended; throws std::runtime_error when that takes long. `out` and `err` are filled.
+    // Waits for the end of the process. Returns its exit code and output; throws std::runtime_error
+    // after a timeout.
     Ended wait();
     Ended end(int number)
     {

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// What tests that run the tool share.
+// The base of tests that run the tool.
 
 #pragma once
 
@@ -20,13 +20,13 @@ namespace Testing {
 
 class ToolTest : public ::testing::Test {
 protected:
-    // A model file with these nodes, written as JSON.
+    // Writes a model file with these nodes, given as JSON. Returns its path.
     std::string model(const std::string& nodes) const
     {
         return folder_.write("model.json", "{ \"nodes\": [" + nodes + "] }");
     }
 
-    // One node of each type, in good and bad states.
+    // Writes a model file with nodes of each type, in good and bad states. Returns its path.
     std::string smallModel() const
     {
         return model(R"(
@@ -43,8 +43,8 @@ protected:
               "baseUnits": 19 })");
     }
 
-    // The tool with its classes in a folder of its own, as an installation puts them; returns the
-    // executable. Without a library yet.
+    // Copies the tool and its classes to a folder laid out as an installation, without the
+    // libraries. Returns the path of the executable.
     std::string install() const
     {
         const auto moved = folder_.path() / "bin" / "sensorctl";

@@ -1,6 +1,7 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// What wbemcli prints and what `sensorctl --json` prints, in one form that can be compared.
+// Converts the outputs of wbemcli and of `sensorctl --json` to a common form, so that they can be
+// compared.
 
 #pragma once
 
@@ -15,20 +16,20 @@
 
 namespace Testing {
 
-// The properties of an instance as texts, by name; a path as a text. Without quotes and
-// backslashes, and without where an object is, as each program writes these in its own way.
+// The properties of an instance by name, values and paths as texts. Quotes, backslashes, hosts and
+// namespaces are left out, since the programs write them differently.
 using PlainProperties = std::map<std::string, std::string>;
 using PlainPaths = std::multiset<std::string>;
 using PlainInstances = std::multimap<std::string, PlainProperties>; // by path
 
 std::string plain(const std::string& text);
 
-// An object as `sensorctl --json` prints it.
+// Converts an object that `sensorctl --json` printed.
 PlainInstances::value_type plainInstance(const nlohmann::json& instance);
 
-// What `wbemcli -nl` printed of instances or classes.
+// Converts the instances or classes that `wbemcli -nl` printed.
 PlainInstances plainInstances(const std::string& output);
-// What wbemcli printed of names, one a line.
+// Converts the names that wbemcli printed, one per line.
 PlainPaths plainPaths(const std::string& output);
 
 PlainPaths pathsOf(const PlainInstances& instances);

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// A broker with a request under way, and short forms of what tests of its objects say often.
+// A broker with a request in progress, and functions that tests of its objects share.
 
 #pragma once
 
@@ -27,7 +27,7 @@ inline std::string textOf(const CMPIString* string)
     return text == nullptr ? "(null)" : text;
 }
 
-// A key, property, argument or element of text.
+// Returns the text of a key, property or element.
 inline std::string textOf(const CMPIData& data)
 {
     return data.type == CMPI_string && (data.state & CMPI_nullValue) == 0
@@ -46,7 +46,7 @@ protected:
     {
         return CMNewInstance(mb, path(className), nullptr);
     }
-    // Of CMPI_uint16.
+    // Returns an array of CMPI_uint16.
     CMPIArray* array(std::initializer_list<CMPIUint16> numbers)
     {
         CMPIArray* const made =

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// A few classes, requests of clients in short forms, and what is read from and written to them.
+// Classes for the tests, and functions that complete, read and answer requests.
 
 #pragma once
 
@@ -90,7 +90,7 @@ inline std::string thing()
     return instanceName("Thing", binding("Name", "a") + binding("Index", "7"));
 }
 
-// The outcome, or "read" when there is nothing wrong.
+// Returns the outcome as text; "read" when the request is accepted.
 inline std::string outcomeOf(const std::string& body)
 {
     try {
@@ -115,7 +115,7 @@ class CimXmlTest : public testing::Test {
 protected:
     Operation read(const std::string& body) { return readOperation(Message(body), *repository); }
 
-    // Code and reason, an outcome, or "read".
+    // Returns the code and the reason of a refusal, the outcome of an error, or "read".
     std::string refusalOf(const std::string& body)
     {
         try {
@@ -137,7 +137,7 @@ protected:
         return refusalOf(call("GetInstance", parameter("InstanceName", name)));
     }
 
-    // Shared: compiling takes longer than any test here.
+    // Returns classes that all tests share, since compiling them takes longer than any test.
     static const Host::Repository& classes()
     {
         static const auto compiled = Testing::compile(Classes);

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Hashes of the password "secret" under each scheme, at the least cost but for one.
+// Hashes of the password "secret" under each scheme; all but one have the least cost.
 
 #pragma once
 

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// A server with operations of the test's making, and requests to it.
+// A server with operations that the test defines, and requests to it.
 
 #pragma once
 
@@ -37,7 +37,7 @@ using Testing::HttpClient;
 using Testing::HttpReply;
 using Testing::lengthField;
 
-// So many pieces of so many bytes.
+// A response of the given number of pieces, each of the given size.
 class PiecewiseResponse : public Host::CimXml::Response {
 public:
     PiecewiseResponse(std::string piece, std::size_t count, std::atomic<int>& alive)
@@ -64,7 +64,7 @@ private:
     std::atomic<int>& alive_;
 };
 
-// Answers with <answer/> unless told otherwise.
+// Answers with <answer/> unless a test sets another answer.
 class StubOperations : public Host::CimXml::OperationHandler {
 public:
     using Work = std::function<void(const Message&, const Caller&)>;
@@ -80,7 +80,7 @@ public:
         return std::make_unique<PiecewiseResponse>(text, repetitions, answersAlive);
     }
 
-    // What is done before the answer.
+    // Sets what each operation does before it answers.
     void doFirst(Work work)
     {
         const std::lock_guard lock(mutex_);
@@ -94,7 +94,7 @@ public:
     }
 
     std::atomic<int> calls{0};
-    std::atomic<int> finished{0}; // to be read before what was done first
+    std::atomic<int> finished{0}; // incremented after the work
     std::atomic<int> answersAlive{0};
 
 private:
@@ -141,7 +141,7 @@ protected:
         return client.receive();
     }
 
-    // Soon.
+    // Expects all answers to be destroyed within a timeout.
     void expectNoAnswerAlive() const
     {
         EXPECT_TRUE(Testing::waitUntil([this] { return operations.answersAlive == 0; }));

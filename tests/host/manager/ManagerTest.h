@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// A manager over scripted providers, and a request under way.
+// A manager with scripted providers, and a request in progress.
 //
 //   Thing         Box, Part (and SpecialPart below it), Idle, which nobody serves
 //   Link          BoxLink: Whole -> Box, Piece -> Part
@@ -36,7 +36,8 @@ inline std::string orNone(const char* text)
     return text == nullptr ? "-" : text;
 }
 
-// What a failed operation says; "code 0" when it did not fail.
+// Returns the code and the message of the Refusal that an operation throws; "code 0" when it does
+// not fail.
 template <typename Operation>
 std::string refusalOf(const Operation& operation)
 {
@@ -56,7 +57,7 @@ protected:
             script(name, [this](const ProviderCall& call) { return answer(call); });
     }
 
-    // Replaces a provider's handler; the call is noted before.
+    // Replaces a provider's handler. The call is recorded before the handler runs.
     void script(const std::string& provider, const ScriptedProvider::Handler& handler)
     {
         providers_[provider].handle([this, provider, handler](const ProviderCall& call) {
@@ -65,13 +66,13 @@ protected:
         });
     }
 
-    // One object of the class that is asked for.
+    // Delivers one object of the requested class.
     CMPIStatus answer(const ProviderCall& call)
     {
         return deliver(call, classOf(call.path).c_str(), "one");
     }
 
-    // Delivers an object of a class, as an instance or as a path, whichever is asked for.
+    // Delivers an object of a class, as an instance or as a path, according to the operation.
     CMPIStatus deliver(const ProviderCall& call, const char* className, const char* name)
     {
         CMPIObjectPath* const path = CMNewObjectPath(broker(), NameSpace, className, nullptr);
@@ -105,7 +106,7 @@ protected:
 
     static ClassTable classes();
 
-    // The classes of what was delivered.
+    // Returns the class names of the delivered objects.
     static std::vector<std::string> delivered(const Host::CollectedResult& answer)
     {
         std::vector<std::string> classes;

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// What the odd provider library tells the test that loads it.
+// The report of the odd provider library to the test that loads it.
 
 #pragma once
 
@@ -12,7 +12,7 @@ struct OddProviderReport {
     int created = 0;
     int cleanedUp = 0;
     int cleanedUpWithContext = 0;
-    CMPIrc upcall = CMPI_RC_OK; // of the factory that calls up
+    CMPIrc upcall = CMPI_RC_OK; // what the up-call of a factory returned
 };
 
 using OddProviderReportFunction = const OddProviderReport* (*)();

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Providers whose handlers a test writes down.
+// Providers whose handlers a test defines.
 
 #pragma once
 
@@ -15,13 +15,13 @@
 
 namespace Testing {
 
-// One call, as the provider sees it.
+// The operation and the arguments of one call.
 struct ProviderCall {
     std::string operation;
     const CMPIContext* context = nullptr;
     const CMPIResult* result = nullptr;
     const CMPIObjectPath* path = nullptr;
-    // What the operation has of these; null where a client named none.
+    // Null where the operation has no such argument or the client gave none.
     const char* associationClass = nullptr;
     const char* resultClass = nullptr;
     const char* role = nullptr;
@@ -29,7 +29,7 @@ struct ProviderCall {
     const char** properties = nullptr;
 };
 
-// Both MIs of one provider; every operation comes to the one handler.
+// Both MIs of one provider. Every operation calls the same handler.
 class ScriptedProvider {
 public:
     using Handler = std::function<CMPIStatus(const ProviderCall&)>;
@@ -81,7 +81,7 @@ inline const CMPIInstanceMIFT ScriptedProvider::instanceTable = {
             const CMPIObjectPath* path, const char** properties) {
             return pass(mi, {"getInstance", context, result, path, {}, {}, {}, {}, properties});
         },
-    .createInstance = nullptr, // what is left out is not supported
+    .createInstance = nullptr, // the other operations are not supported
     .modifyInstance = nullptr,
     .deleteInstance = nullptr,
     .execQuery = nullptr,
@@ -125,8 +125,8 @@ inline const CMPIAssociationMIFT ScriptedProvider::associationTable = {
 
 using ScriptedProviders = std::map<std::string, ScriptedProvider>;
 
-// Registers the provider of that name, which is made if need be. The providers must outlive what
-// it is registered with.
+// Returns a registration of the provider of that name, which is created at its first use. The
+// providers must outlive the manager that gets the registration.
 inline Host::ProviderRegistration registration(ScriptedProviders& providers,
     const std::string& className, const std::string& name, bool servesAssociations = false)
 {

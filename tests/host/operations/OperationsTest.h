@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Messages brought to a handler, and what is read of its answers.
+// Sends messages to a handler and reads its responses.
 
 #pragma once
 
@@ -53,7 +53,8 @@ inline std::string answerTo(
     return textOf(*handler.answer(Message(body), caller));
 }
 
-// What stands between the first such two texts; empty when they are not there.
+// Returns the text between the first occurrences of two texts; an empty text when they do not
+// occur.
 inline std::string between(
     const std::string& text, const std::string& begin, const std::string& end)
 {
@@ -64,7 +65,8 @@ inline std::string between(
     return text.substr(from + begin.size(), to - from - begin.size());
 }
 
-// Such as `6: there is no ...`; empty for an answer that is no error.
+// Returns the code and the description of an error, such as `6: there is no ...`; an empty text for
+// any other response.
 inline std::string errorIn(const std::string& answer)
 {
     const std::string code = between(answer, "<ERROR CODE=\"", "\"");

@@ -1,7 +1,7 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// A dispatcher over scripted providers: Things and Gauges serve the classes Thing and Gauge, which
-// is below it, Links serves the association Link.
+// A dispatcher with scripted providers: Things serves the class Thing, Gauges its subclass Gauge,
+// and Links the association Link.
 
 #pragma once
 
@@ -43,7 +43,7 @@ public:
         providers_[provider].handle(std::move(handler));
     }
 
-    // Makes the provider of Thing answer with so many things, their names the numbers from 0 on.
+    // Has the provider of Thing deliver `count` objects, named by the numbers from 0.
     void deliverThings(unsigned count)
     {
         script("Things", [this, count](const ProviderCall& asked) {
@@ -53,7 +53,7 @@ public:
         });
     }
 
-    // An instance or a path, whichever the operation is about.
+    // Delivers an instance or a path, according to the operation.
     CMPIStatus deliver(const ProviderCall& asked, const char* className, const std::string& name)
     {
         CMPIObjectPath* const path = CMNewObjectPath(broker(), "root/test", className, nullptr);

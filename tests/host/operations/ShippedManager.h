@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The object manager as it is shipped, on a small machine.
+// The object manager with the shipped classes and providers, on a small machine.
 
 #pragma once
 

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Short MOF texts, compiled together with the declarations of a few common qualifiers.
+// Compiles short MOF texts together with the declarations of common qualifiers.
 
 #pragma once
 
@@ -44,7 +44,7 @@ inline std::unique_ptr<const Host::Repository> compile(std::string_view text)
     return std::move(compiler).finish();
 }
 
-// Returns what is wrong with the text, and where; an empty text when nothing is.
+// Returns the error in the text with its position; an empty text when there is none.
 inline std::string errorOf(std::string_view text)
 {
     return errorOf([&] { compile(text); });
@@ -68,7 +68,7 @@ inline const Host::PropertyDeclaration& propertyNamed(
     return *found;
 }
 
-// The default of the one property `P` of class `A`.
+// Returns the default of the property `P` of the class `A`.
 inline Host::Constant defaultOf(const std::string& typeAndName, const std::string& value)
 {
     const auto repository = compile("class A { " + typeAndName + " = " + value + "; };");

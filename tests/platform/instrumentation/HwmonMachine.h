@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Machines whose sysfs a test writes down.
+// Machines whose sysfs tree a test defines.
 
 #pragma once
 
@@ -17,7 +17,7 @@
 
 namespace Testing {
 
-// Every test sees the kernel's sensors only, with a sensors configuration that says nothing.
+// Each test runs with the source hwmon alone and an empty sensors configuration.
 class HwmonTest : public MountNamespaceTest {
 protected:
     void SetUp() override
@@ -36,7 +36,7 @@ private:
 
 using Attributes = std::map<std::string, std::string>;
 
-// A machine with one chip, "testchip-isa-0290", that has these attributes.
+// A machine with one chip, "testchip-isa-0290", and the given attributes.
 class OneChip {
 public:
     explicit OneChip(const Attributes& attributes) : sysfs_("")
@@ -62,7 +62,7 @@ inline std::string testchip(const std::string& feature)
     return "/hwmon/testchip-isa-0290/" + feature;
 }
 
-// The node of a machine that has no other.
+// Returns the only node of a machine.
 inline SeenNode only(const std::vector<SeenNode>& nodes)
 {
     if (nodes.size() != 1)
@@ -70,7 +70,7 @@ inline SeenNode only(const std::vector<SeenNode>& nodes)
     return nodes.front();
 }
 
-// The one node of a chip with these attributes.
+// Returns the only node of a chip with these attributes.
 inline SeenNode nodeOf(const Attributes& attributes)
 {
     const OneChip chip(attributes);

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// What a cursor shows of a whole machine.
+// The nodes of a machine, as a cursor shows them.
 
 #pragma once
 
@@ -52,7 +52,7 @@ inline SeenNode seeNode(Vorn::Instrumentation& cursor, Vorn::NodeLexicon::NodeTy
     return seen;
 }
 
-// Temperatures, voltages, tachometers, each type with a cursor of its own.
+// Returns the temperatures, voltages and tachometers, each type read with a cursor of its own.
 inline std::vector<SeenNode> walk()
 {
     using Vorn::NodeLexicon::NodeType;

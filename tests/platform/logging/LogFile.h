@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// A file that a sink writes to, and the shortest way to write a line.
+// A file that a sink writes to, and a function that writes one line.
 
 #pragma once
 
@@ -25,7 +25,8 @@ private:
     TemporaryFolder folder_;
 };
 
-// Closes both channels again, so that no test sees the lines of another.
+// Sets the log during its lifetime and closes both channels at its end, so that no test reads the
+// lines of another.
 class ScopedLogSettings {
 public:
     explicit ScopedLogSettings(const RynLog::LogSettings& settings) { RynLog::configure(settings); }

@@ -1,7 +1,7 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// What the process sends to syslog. The C library's functions are replaced in this test program,
-// so that what would reach the system's log can be looked at.
+// Captures the lines that the process sends to syslog by replacing the C library's functions in
+// this test program.
 
 #pragma once
 
@@ -15,10 +15,11 @@ struct SyslogLine {
     std::string text;
 };
 
-// The lines since the previous call.
+// Returns the lines since the previous call.
 std::vector<SyslogLine> takeSyslogLines();
 
-// How often openlog, closelog and setlogmask were called: each changes the process's settings.
+// Returns the number of calls of openlog, closelog and setlogmask, each of which changes the
+// settings of the process.
 int syslogSettingsChanged();
 
 } // namespace Testing

@@ -1,7 +1,7 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Object paths, strings and points in time made of a table, with the oddities of real and of
-// broken brokers.
+// Test doubles for object paths, strings and date-times, which can behave as real and as broken
+// brokers do.
 
 #pragma once
 
@@ -16,7 +16,7 @@
 
 namespace Testing {
 
-// Returns a key's value of a type, whose member of CMPIValue is a number or a pointer.
+// Returns a key's value of the type that belongs to the member of CMPIValue.
 template <typename Member>
 CMPIData valueOf(CMPIType type, Member member)
 {
@@ -27,7 +27,7 @@ CMPIData valueOf(CMPIType type, Member member)
     return data;
 }
 
-// A broker's string. Without text its character pointer is null.
+// A broker's string. Its character pointer is null where there is no text.
 class FakeString {
 public:
     explicit FakeString(std::optional<std::string> text);
@@ -44,7 +44,7 @@ private:
     CMPIString object_{};
 };
 
-// A point in time whose standard form is the text.
+// A date-time whose string format is the text.
 class FakeDateTime {
 public:
     explicit FakeDateTime(std::optional<std::string> form);
@@ -70,7 +70,7 @@ public:
     CMPIObjectPath* get() { return &object_; }
     void loseHandle() { object_.hdl = nullptr; }
 
-    // Each returns the path, so that keys can be listed in a row.
+    // Each returns the path, so that calls can be chained.
     FakePath& key(const std::string& name, const CMPIData& value);
     FakePath& text(const std::string& name, std::optional<std::string> value);
     FakePath& chars(const std::string& name, const char* value)
@@ -104,7 +104,7 @@ private:
     std::deque<FakeDateTime> dateTimes_;
 };
 
-// A value that must not be looked at: its pointer leads nowhere.
+// Returns a value that must not be read: its pointer is invalid.
 CMPIData poisoned(CMPIType type, CMPIValueState state);
 
 } // namespace Testing
