@@ -1,7 +1,7 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// What lies at the far end of an association, for each end of each association and for what is
-// none.
+// The class at the far end of an association, for each end of each association and for sources that
+// are no end.
 
 #include "factory/ClassNames.h"
 #include "factory/SensorFactory.h"
@@ -169,7 +169,7 @@ TEST_P(AssociationRowTest, APathTheBrokerDoesNotMakeIsNoTarget)
     }
 }
 
-// ---- What is no end ----
+// ---- Sources that are no end ----
 
 TEST_F(AssociationTargetTest, AnotherProvidersEndHasNoTarget)
 {
@@ -186,7 +186,7 @@ TEST_F(AssociationTargetTest, AnotherProvidersEndHasNoTarget)
 
 TEST_F(AssociationTargetTest, NoTargetLeavesTheTextOfTheStatusToTheCaller)
 {
-    // The broker's calls on the way succeed and say so; nothing else is written.
+    // The broker's calls succeed and set the status to OK; the factory does not set it.
     CMPIStatus* const none = nullptr;
     EXPECT_EQ(SensorFactory::get_assoc_targetClass_Name(
                   broker(), path(System).handle(), ElementCapabilities, nullptr, none),

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The factory's capabilities as instances and object paths.
+// The enumeration of the factory's capabilities as instances and object paths.
 
 #include "factory/SensorFactory.h"
 #include "tests/support/FaultyBroker.h"
@@ -212,7 +212,7 @@ TEST_F(CapabilitiesEnumerationTest, WithoutAStatusAMissingPathIsToldToTheTraceAl
     EXPECT_EQ(messages_.size(), 1U);
 }
 
-// ---- Trace lines of what ends early ----
+// ---- Trace lines of operations that end early ----
 
 TEST_F(CapabilitiesEnumerationTest, AnUnknownIdentifierLeavesTheExitingLineOut)
 {

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// From a capabilities record to an instance: which properties, of which types, with which values.
+// The instance that is built from a capabilities record: its properties, their types and values.
 
 #include "factory/SensorFactory.h"
 #include "tests/support/FaultyBroker.h"
@@ -44,7 +44,8 @@ protected:
         return namesOf(make(properties.data(), isObjPath).properties());
     }
 
-    // One instance by a broker that fails; null or handle-less ones as they come.
+    // Builds an instance with a broker that fails. Returns it also where it is null or has no
+    // handle.
     CMPIInstance* buildWith(const Testing::Fault& fault, CMPIStatus* rc,
         const char** properties = nullptr, bool isObjPath = false)
     {
@@ -102,7 +103,8 @@ TEST_F(CapabilitiesInstanceBuilderTest, APropertyListDecidesWhateverTheObjectPat
             ElementsAre("InstanceID", "RequestedStatesSupported", "ElementNameEditSupported"));
 }
 
-// The broker's filter holds the list as well, so what it does not name is dropped there.
+// The broker's filter has the list as well, so that the broker drops properties that it does not
+// name.
 TEST_F(CapabilitiesInstanceBuilderTest, AListSelectsItsPropertiesAndTheKey)
 {
     EXPECT_THAT(namesWith({"RequestedStatesSupported"}),
@@ -150,7 +152,7 @@ TEST_F(CapabilitiesInstanceBuilderTest, ThePathHasTheRequestsNamespaceAndThisSys
     EXPECT_EQ(made.nameSpace(), "root/other");
     EXPECT_EQ(made.host(), systemName_);
     EXPECT_EQ(made.className(), Class);
-    // The filter's key list names the key.
+    // The key list of the filter contains the key.
     EXPECT_THAT(describe(made.keys()),
         ElementsAre("InstanceID = string \"ZUMLO:SensorEnabledLogicalElementCap1\""));
 }
@@ -174,7 +176,7 @@ TEST_F(CapabilitiesInstanceBuilderTest, WithoutAPathThereIsNoInstance)
 TEST_F(CapabilitiesInstanceBuilderTest, AnInstanceTheBrokerDoesNotMakeIsReturnedAsItCame)
 {
     EXPECT_EQ(buildWith({BrokerCall::newInstance, 1, FaultManner::nullResult}, &rc_), nullptr);
-    EXPECT_EQ(rc_.rc, CMPI_RC_OK); // the broker is handed no status
+    EXPECT_EQ(rc_.rc, CMPI_RC_OK); // the status is not passed to the broker
     const CMPIInstance* const made =
         buildWith({BrokerCall::newInstance, 1, FaultManner::handleless}, &rc_);
     ASSERT_NE(made, nullptr);

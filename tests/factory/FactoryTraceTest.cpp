@@ -16,7 +16,7 @@ using namespace Vorn::SensorProfileProvider;
 using namespace Testing;
 using namespace ::testing;
 
-// A parameter list as the operation's arguments print.
+// Returns a parameter list as the operation prints it.
 template <typename... LabelsAndValues>
 std::string listOf(const LabelsAndValues&... items)
 {
@@ -27,8 +27,9 @@ std::string listOf(const LabelsAndValues&... items)
 
 class FactoryTraceTest : public ProviderTest {
 protected:
-    // The two lines of an operation; a line number of 0 is that of the source. The address of a
-    // record is not compared, since a builder takes its record by value.
+    // Expects the entering and exiting line of an operation. A line number of 0 stands for that of
+    // the source. The address of a record is not compared, since a builder takes its record by
+    // value.
     static void expectTraced(const LogCapture& capture, const std::string& operation,
         unsigned entry, unsigned exit, const std::string& parameters)
     {
@@ -63,7 +64,7 @@ protected:
     CMPIStatus rc_ = {CMPI_RC_OK, nullptr};
 };
 
-// Whether instances are enumerated for the sake of their object paths.
+// The parameter is whether instances are enumerated for their object paths.
 class FactoryInstancesTraceTest : public FactoryTraceTest,
                                   public ::testing::WithParamInterface<bool> {};
 
@@ -108,7 +109,7 @@ TEST_P(FactoryInstancesTraceTest, ShowsAllCapabilitiesInstances)
             " isObjPath=", GetParam(), " instances=", &instances_, " rc=", &rc_));
 }
 
-// The instance is built whole.
+// The instance is built with all properties.
 TEST_F(FactoryTraceTest, ShowsOneSensorInstance)
 {
     CMPIString* const key = Host::String::make(request_->arena(), "Fan:/f").handle();

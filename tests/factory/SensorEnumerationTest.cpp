@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The factory's sensors as instances and object paths.
+// The enumeration of the factory's sensors as instances and object paths.
 
 #include "factory/SensorFactory.h"
 #include "tests/support/ProviderTest.h"
@@ -15,7 +15,7 @@ using namespace ::testing;
 using Vorn::NodeReading;
 using Vorn::NodeLexicon::NodeType;
 
-// Harvested as Z, X, Y.
+// The sensors in the order of the harvest: Z, X, Y.
 const std::vector<ScriptedNode> Unsorted = {{NodeType::Temperature, "/p", "Z", NodeReading{}},
     {NodeType::Voltage, "/p", "X", NodeReading{}},
     {NodeType::Tachometer, "/p", "Y", NodeReading{}}};
@@ -90,7 +90,7 @@ TEST_F(SensorEnumerationTest, OneInstanceIsFoundByItsWholeIdentifier)
     EXPECT_EQ(property(*Host::Instance::of(instances_[0]), "ElementName"), "string \"Y\"");
 }
 
-// Twenty, since sorting keeps the order of a few records even where it does not promise to.
+// There are twenty duplicates, since std::sort keeps the order of a few records by chance.
 class DuplicateTest : public SensorEnumerationTest {
 protected:
     DuplicateTest() : SensorEnumerationTest(duplicates()) {}
@@ -111,7 +111,7 @@ TEST_F(DuplicateTest, TheLastSensorOfOneIdentifierIsTheOnePublished)
     EXPECT_EQ(property(*Host::Instance::of(instances_[0]), "CurrentReading"), "sint32 19");
 }
 
-// More sensors than a 16-bit count can say.
+// There are more sensors than a 16-bit count can hold.
 class ManyTest : public SensorEnumerationTest {
 protected:
     explicit ManyTest(std::size_t count = 65537) : SensorEnumerationTest(nodes(count)) {}
@@ -199,7 +199,7 @@ TEST_F(EmptyMachineTest, LeavesAStatusThatWasSetAsItIs)
     EXPECT_EQ(rc_.msg, nullptr);
 }
 
-// ---- Trace lines of what ends early ----
+// ---- Trace lines of operations that end early ----
 
 TEST_F(SensorEnumerationTest, AnUnknownIdentifierLeavesTheExitingLineOut)
 {

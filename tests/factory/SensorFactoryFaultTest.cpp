@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// What the factory's operations on sensors tell their caller when the broker fails them.
+// The results and statuses of the factory's operations on sensors when calls of the broker fail.
 
 #include "factory/ClassNames.h"
 #include "factory/SensorFactory.h"
@@ -126,7 +126,8 @@ TEST_P(UndeliveredTest, AnInstanceThatCannotBeMadeLeavesTheStatusAndHasItsExitin
     EXPECT_THAT(messages_, IsEmpty());
 }
 
-// Alone in the list, so that no array after it has the broker write the status again.
+// The property is alone in the list, so that the broker does not set the status again for a later
+// array.
 TEST_P(UndeliveredTest, WithoutPossibleStatesTheStatusIsWhatTheBrokerMadeIt)
 {
     const char* properties[] = {"PossibleStates", nullptr};
@@ -143,7 +144,7 @@ TEST_P(UndeliveredTest, WithoutPossibleStatesTheStatusIsWhatTheBrokerMadeIt)
     }
 }
 
-// The broker is handed the status when it reads the key.
+// The status is passed to the broker when it reads the key.
 TEST_F(SensorFactoryFaultTest, AnUnknownIdentifierLeavesTheStatusAsTheBrokerMadeIt)
 {
     CMPIString* const key = CMNewString(faulty_.handle(), "unknown", nullptr);

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The factory's life: what it harvests, how it counts and what it traces.
+// The factory's constructor, counts and trace lines.
 
 #include "factory/SensorFactory.h"
 

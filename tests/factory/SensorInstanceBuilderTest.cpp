@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// From a sensor record to an instance: which properties, of which types, with which values.
+// The instance that is built from a sensor record: its properties, their types and values.
 
 #include "factory/SensorFactory.h"
 #include "tests/support/ProviderTest.h"
@@ -185,7 +185,7 @@ TEST_F(SensorInstanceBuilderTest, EachPropertyIsSelectedByItsName)
         EXPECT_EQ(namesWith({name}), keysAnd({name}));
 }
 
-// The broker's filter holds the list as well: Status is dropped there unless it is listed.
+// The broker's filter has the list as well: the broker drops Status unless it is listed.
 TEST_F(SensorInstanceBuilderTest, StatusTravelsWithHealthState)
 {
     EXPECT_EQ(namesWith({"Status"}), keys());

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Running out of memory while the capabilities record is appended.
+// An allocation failure while the capabilities record is appended.
 
 #include "model/SensorHarvest.h"
 #include "tests/model/FailingAllocation.h"
@@ -12,7 +12,7 @@ namespace {
 
 using namespace Vorn::SensorProfileProvider;
 
-// A vector about to grow to a size that nothing else asks for.
+// Returns a full vector, whose next allocation has a size that no other allocation has.
 std::vector<SensorEnabledLogCap> fullVector()
 {
     std::vector<SensorEnabledLogCap> capabilities(37);

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The cursors of a harvest, and what it takes from a node's path.
+// The cursors of a harvest, and its use of a node's path.
 
 #include "model/SensorHarvest.h"
 
@@ -59,7 +59,7 @@ TEST(HarvestFailureTest, OfAKindThatIsNoStandardExceptionIsTheCallers)
     std::vector<unsigned> marks;
     for (const LogLine& line : capture.log())
         marks.push_back(line.line);
-    EXPECT_THAT(marks, ElementsAre(668, 740)); // entered, not left
+    EXPECT_THAT(marks, ElementsAre(668, 740)); // entering marks only
 }
 
 TEST(HarvestTest, NamesASensorByThePrintableFormOfItsPath)

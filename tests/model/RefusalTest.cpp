@@ -1,7 +1,7 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// What the harvest does when a record refuses a value, whichever value that is, and the order
-// in which it hands values over.
+// The harvest of a record that refuses a value, for each value, and the order in which the harvest
+// sets them.
 
 #include "diagnostics/ProviderException.h"
 #include "model/SensorHarvest.h"
@@ -23,7 +23,7 @@ struct Refusal {
     std::string message;
 };
 
-// In the order of the harvest.
+// The setters in the order of the harvest.
 const std::vector<Refusal> Refusals = {
     {"setDeviceID", "Failed while setting Device ID"},
     {"setElementName", "Failed while setting Element Name"},
@@ -41,7 +41,7 @@ const std::vector<Refusal> Refusals = {
     {"setUpperThresholdCritical", "Failed while setting UpperThresholdCritical"},
     {"setLowerThresholdFatal", "Failed while setting LowerThresholdFatal"},
     {"setUpperThresholdFatal", "Failed while setting UpperThresholdFatal"},
-    {"setBaseUnits", "Failed while setting Requested State"}, // names another field, on purpose
+    {"setBaseUnits", "Failed while setting Requested State"}, // deliberately names another field
 };
 
 ScriptedNode fullNode(NodeType type, const std::string& name)

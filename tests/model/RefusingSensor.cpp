@@ -1,7 +1,7 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// A record that refuses the value the test names: it takes the place of the real one, most of
-// whose setters accept everything.
+// A record that refuses the value that a test names. It replaces the real one, most of whose
+// setters accept every value.
 
 #include "tests/model/RefusingSensor.h"
 

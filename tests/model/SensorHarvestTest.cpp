@@ -84,7 +84,7 @@ TEST(HarvestTest, ThatFailsOutlivesAStandardErrorThatNobodyReads)
     const int standardError = dup(STDERR_FILENO);
     dup2(ends[1], STDERR_FILENO);
     std::vector<Sensor> sensors;
-    const bool nothing = getSensorInstances(sensors); // SIGPIPE would end the program here
+    const bool nothing = getSensorInstances(sensors); // SIGPIPE would terminate the program here
     dup2(standardError, STDERR_FILENO);
     close(standardError);
     close(ends[1]);
@@ -224,7 +224,7 @@ TEST(HarvestTest, DoesNotCarryValuesFromOneNodeToTheNext)
 
 // ---- Failures ----
 
-// What the base class says, never the failure's own text.
+// The text of the base class; the exception's own text is never printed.
 const std::string Generic = "std::exception\n";
 
 TEST(HarvestFailureTest, AtConstructionIsReportedOncePerTypeWithTheGenericText)
@@ -246,7 +246,8 @@ protected:
             node(Tachometer, "f2"), node(Tachometer, "f3")};
     }
 
-    // The names that are left when the walk of the type ends before the given position.
+    // Returns the names that are harvested when the iteration of the type ends before the given
+    // position.
     std::vector<std::string> namesWhenTypeEndsAt(std::size_t position) const
     {
         std::vector<std::string> left;

@@ -13,7 +13,7 @@ using Vorn::SensorProfileProvider::Sensor;
 using Codes = std::vector<std::uint16_t>;
 using Labels = std::vector<std::string>;
 
-// Every code a table could mistake for another, and some far away.
+// All codes near the entries of the tables, and some far from them.
 const std::vector<unsigned> AllCodes = [] {
     std::vector<unsigned> codes;
     for (unsigned code = 0; code <= 40; ++code)
@@ -276,14 +276,14 @@ const std::vector<Scaling> Scalings = {
     {22, 2.9, 2},
     {22, -2.9, -2},
     {20, 1234.9, 1234},
-    // The product is not rounded to double before it is cut.
+    // The product is not rounded to double before it is truncated.
     {21, 3.3, 3299},
     {21, 4.35, 4349},
     {21, -3.3, -3299},
     {21, 1.1, 1100},
     {21, 0.0, 0},
     {99, 3.3, 3},
-    // The range.
+    // The limits of the range.
     {22, 2147483647.0, 2147483647},
     {22, 2147483647.9, 2147483647},
     {22, 2147483648.0, OutOfRange},

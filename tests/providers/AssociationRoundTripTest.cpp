@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Every path that one request is answered with can be asked for in the next one.
+// Every path that a request returns is the source of a further request.
 
 #include "tests/providers/AssociationTest.h"
 #include "tests/providers/ClosingResult.h"
@@ -11,7 +11,7 @@ namespace AssociationRoundTripTests {
 
 using namespace Testing;
 
-// The association and the class at its other end.
+// An association and the class at its far end.
 struct Journey {
     const char* name;
     const char* association;
@@ -42,7 +42,7 @@ protected:
         return std::string(GetParam().otherClass) == SystemClass ? system("guest") : capabilities();
     }
 
-    // The objects at the paths that were delivered, each as its class's provider tells it.
+    // Removes the delivered objects from the result. Returns their paths.
     std::vector<const Host::ObjectPath*> takeDelivered()
     {
         std::vector<const Host::ObjectPath*> taken = answer_.paths();
@@ -105,7 +105,7 @@ TEST_P(AssociationRoundTripTest, FromNamesAndInstancesToInstances)
         expectFetched(instance->objectPath());
 }
 
-// Unlike the instance providers' requests.
+// Providers of records write the exit mark after they have closed the result.
 TEST_P(AssociationRoundTripTest, RequestsForInstancesEndWithTheirExitMarkBeforeTheResultIsClosed)
 {
     const Host::ObjectPath& keyless = path(GetParam().association);

@@ -1,6 +1,7 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// A key is a text by its type and state, an element of an up-call by its type and pointer alone.
+// A key is accepted as a text by its type and state, an element of an up-call by its type and
+// pointer alone.
 
 #include "providers/AssociationRequests.h"
 #include "tests/support/ProviderTest.h"
@@ -18,7 +19,7 @@ constexpr CMPIType NoText[] = {CMPI_null, CMPI_chars, CMPI_uint64, CMPI_sint64, 
 
 class BrokerValuesTest : public ProviderTest {
 protected:
-    // What a path whose one key is this value is read as.
+    // Returns the text that is read from a path whose only key has this value.
     static CMPIString* readAsText(const CMPIData& key, CMPIStatus* status)
     {
         static CMPIData answer;

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// What becomes of a request of the capabilities class when the broker fails it.
+// The requests of the capabilities class when calls of the broker fail.
 
 #include "tests/providers/Factories.h"
 #include "tests/providers/FaultyAssociation.h"
@@ -81,11 +81,11 @@ TEST_F(CapabilitiesProviderFaultTest, EveryRequestReturnsTheStatusThatTheBrokerL
     const auto instances = run(Instances,
         {BrokerCall::newObjectPath, 1, FaultManner::nullResult, CMPI_RC_ERR_ACCESS_DENIED});
     EXPECT_EQ(instances->status.rc, CMPI_RC_ERR_ACCESS_DENIED);
-    EXPECT_EQ(instances->answer.refused(), 1U); // the null instance is passed on
+    EXPECT_EQ(instances->answer.refused(), 1U); // the null instance is passed to the result
     EXPECT_TRUE(instances->answer.isDone());
 }
 
-// AddressSanitizer watches how far each is read.
+// The faulty broker reads whole values, so that AddressSanitizer reports one that is shorter.
 TEST_F(CapabilitiesProviderFaultTest, EveryValueIsWhole)
 {
     const auto request = run(Instances, std::vector<Fault>{});

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The requests of ZUMLO_SensorEnabledLogicalElementCapabilities, from the object manager's side.
+// The requests of ZUMLO_SensorEnabledLogicalElementCapabilities, as an object manager sends them.
 
 #include "tests/providers/InstanceRequestsTest.h"
 #include "tests/providers/ProfileClasses.h"
@@ -114,7 +114,7 @@ TEST_F(CapabilitiesProviderTest, AnInstanceIsFoundByItsIdentifier)
     EXPECT_TRUE(messages_.empty());
 }
 
-// ---- A key that is no text: nothing is found, though the machine has a sensor ----
+// ---- Keys that are no text, which find nothing although the machine has a sensor ----
 
 TEST_F(CapabilitiesProviderTest, ASensorsOwnPathFindsNothingHere)
 {

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The trace lines of whole requests of the capabilities class, line by line.
+// The trace lines of whole requests of the capabilities class.
 
 #include "tests/providers/Factories.h"
 #include "tests/providers/RequestTrace.h"
@@ -107,7 +107,7 @@ TEST_F(CapabilitiesProviderTraceTest, OfAnInstanceNotFound)
             lines.failure(OneInstance + " failed", 215), lines.exit(217)})));
 }
 
-// The search is made among the capabilities of a factory that has sensors only.
+// The request searches the capabilities of a factory that has only sensors.
 TEST_F(CapabilitiesProviderTraceTest, OfAnInstanceSearchedByItsPath)
 {
     const HandlerLines lines = handler("GetInstance");

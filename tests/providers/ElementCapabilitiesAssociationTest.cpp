@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// What ZUMLO_SensorElementCapabilities leads to, from either end.
+// The requests along ZUMLO_SensorElementCapabilities, from either end.
 
 #include "tests/providers/AssociationTest.h"
 
@@ -30,7 +30,7 @@ protected:
         return AssociationTest::pairs("ManagedElement", "Capabilities");
     }
 
-    // That the request fails for lack of a target, with the text of its kind.
+    // Expects the request to fail for lack of a target with the text of its operation.
     void expectNoTarget(const CMPIStatus& status, const std::string& text)
     {
         expectFailure(status, text);
@@ -97,7 +97,7 @@ TEST_F(ElementCapabilitiesAssociationTest, AssociatorsAreWhole)
     expectOk(associators(capabilities()));
     ASSERT_EQ(answer_.instances().size(), 3U);
     for (const Host::Instance* const instance : answer_.instances())
-        EXPECT_GT(instance->properties().size(), 4U); // more than an object path needs
+        EXPECT_GT(instance->properties().size(), 4U); // more than an object path has
 }
 
 TEST_F(ElementCapabilitiesWithoutSensorsTest, AssociatorsOfCapabilitiesAreAnOpenEmptyAnswer)
@@ -128,7 +128,7 @@ TEST_F(ElementCapabilitiesWithoutSensorsTest, NamesOfAssociatorsAreAnOpenEmptyAn
     expectNothing(false);
 }
 
-// ---- What narrows an answer and what does not ----
+// ---- Parameters that restrict a result and those that do not ----
 
 TEST_F(ElementCapabilitiesAssociationTest, NoFilterButTheAssociationClassTakesPart)
 {
@@ -175,7 +175,7 @@ TEST_F(ElementCapabilitiesAssociationTest, AnAbsentAssociationClassIsTheProvider
     EXPECT_EQ(answer_.paths().size(), 3U);
 }
 
-// A target of a class that this provider does not lead to.
+// The class of the target is not that of the far end.
 TEST_F(ElementCapabilitiesAssociationTest, TheOtherAssociationOfASensorLeadsNowhere)
 {
     expectOk(associators(sensor("A:/1"), {.associationClass = "ZUMLO_SensorSystemDevice"}));
@@ -231,7 +231,7 @@ TEST_F(ElementCapabilitiesAssociationTest, ReferencesOfASensorPairItWithTheCapab
     expectOk(references(source, {.properties = properties}));
     ASSERT_EQ(answer_.instances().size(), 1U);
     const Host::Instance& only = *answer_.instances()[0];
-    EXPECT_THAT(describe(only.properties()), // the list does not narrow it
+    EXPECT_THAT(describe(only.properties()), // the property list does not restrict it
         ElementsAre("ManagedElement = ref " + source.toText(),
             "Capabilities = ref " + capabilities("root/other").toText()));
     EXPECT_EQ(only.className(), Class);
@@ -263,7 +263,7 @@ TEST_F(ElementCapabilitiesAssociationTest, NamesOfReferencesAreThePathsOfTheSame
     EXPECT_FALSE(answer_.isDone());
 }
 
-// Some brokers tell an instance's path without its namespace.
+// Some brokers return an instance's path without its namespace.
 TEST_F(ElementCapabilitiesAssociationTest, NamesOfReferencesAreGivenTheRequestsNamespace)
 {
     CMPIInstanceFT functions = Host::Instance::functions;

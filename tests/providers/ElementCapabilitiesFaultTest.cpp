@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// What becomes of a request of ZUMLO_SensorElementCapabilities when the broker fails it.
+// The requests of ZUMLO_SensorElementCapabilities when calls of the broker fail.
 
 #include "tests/providers/Factories.h"
 #include "tests/providers/FaultyAssociation.h"
@@ -48,8 +48,7 @@ protected:
         return {"SensorElementCapabilities", Provider, function};
     }
 
-    // That the builder reports a failure so, within a request that answers as if nothing had
-    // been there.
+    // Expects this report of a failure by the builder, and an empty result with status OK.
     void expectBuilderFailure(const Fault& fault, const std::string& statusText,
         const std::string& traceText, const std::string& messageText)
     {
@@ -65,7 +64,7 @@ protected:
         }
     }
 
-    // That the enumeration of names ends with a status of its own.
+    // Expects the enumeration of names to end with this status.
     void expectNamesFailure(
         const Fault& fault, const std::string& statusText, const std::string& traceText)
     {
@@ -78,7 +77,7 @@ protected:
     }
 };
 
-// ---- Every call, every way ----
+// ---- Every call in every manner ----
 
 class ElementCapabilitiesFaultSweepTest : public ElementCapabilitiesFaultTest,
                                           public ::testing::WithParamInterface<RequestKind> {};
@@ -101,8 +100,8 @@ TEST_P(ElementCapabilitiesFaultSweepTest, IsSurvivedAndAnswersWithNothingMadeUp)
     });
 }
 
-// ---- The walk over all pairs. Paths are made in this order: both sensors, then for each sensor
-// ---- the capabilities and the association. A sensor has four keys, capabilities one. ----
+// ---- The iteration over all pairs. Paths are made in this order: both sensors, then for each
+// ---- sensor the capabilities and the association. A sensor has four keys, capabilities one. ----
 
 constexpr unsigned FirstSensor = 1;
 constexpr unsigned FirstCapabilities = 3;
@@ -236,7 +235,7 @@ TEST_F(ElementCapabilitiesFaultTest, AnAssociatorThatCannotBeMadeIsPassedOnAsItI
         }
 }
 
-// The status of the request is not handed over where an instance is asked for its path.
+// The status of the request is not passed to the call that returns the path of an instance.
 TEST_F(ElementCapabilitiesFaultTest, APathThatIsNotToldLeavesTheStatus)
 {
     const Fault fault = {BrokerCall::getObjectPath, 2, FaultManner::nullResult}; // the last
@@ -312,7 +311,7 @@ TEST_F(ElementCapabilitiesFaultTest, ATargetThatCannotBeMadeIsNoTarget)
             }
 }
 
-// The ends of the paths and the trace line with which a fetch of them ends.
+// Each fetch of the paths ends with its own trace line.
 TEST_F(ElementCapabilitiesFaultTest, FarEndsThatCannotBeMadeEndInTheFactorysStatus)
 {
     const std::string functions[] = {"", "SensorElementCapabilities_AssociatorNames",

@@ -114,7 +114,7 @@ TEST_F(ElementCapabilitiesOfNoSensorTest, HasNoInstancesInAClosedResult)
                                "Exiting EnumerateInstanceNames***"}));
 }
 
-// The broker that knows the class keeps its keys whatever the filter says.
+// A broker that has the class keeps its keys whatever the filter.
 TEST_F(ElementCapabilitiesInstanceTest, APropertyListKeepsTheKeysOfAClassThatIsKnown)
 {
     const char* properties[] = {"Characteristics", nullptr};
@@ -124,7 +124,7 @@ TEST_F(ElementCapabilitiesInstanceTest, APropertyListKeepsTheKeysOfAClassThatIsK
         ElementsAre("ManagedElement", "Capabilities"));
 }
 
-// The filter's own keys are no properties of the class.
+// The keys of the filter are no properties of the class.
 TEST_F(ElementCapabilitiesInstanceTest, APropertyListDecidesWhereTheClassIsNotKnown)
 {
     broker_.setClassInformation(nullptr);

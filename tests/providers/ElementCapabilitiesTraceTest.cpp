@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The trace lines of whole requests of ZUMLO_SensorElementCapabilities, line by line.
+// The trace lines of whole requests of ZUMLO_SensorElementCapabilities.
 
 #include "tests/providers/AssociationTest.h"
 #include "tests/providers/RequestTrace.h"
@@ -42,7 +42,7 @@ protected:
 
 // ---- Instances ----
 
-// The capabilities are fetched anew for each of the two sensors.
+// The capabilities are fetched for each of the two sensors.
 TEST_F(ElementCapabilitiesTraceTest, OfEnumeratedNames)
 {
     const HandlerLines lines = handler("SensorElementCapabilities_EnumInstanceNames");

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The six factories, their tables, and the handlers that do nothing.
+// The six factory functions, their tables, and the handlers without an effect.
 
 #include "tests/providers/Factories.h"
 #include "tests/support/LogCapture.h"

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Requests whose factory fails to enumerate instances.
+// Requests for which the factory fails to enumerate instances.
 
 #include "tests/providers/AssociationTest.h"
 #include "tests/providers/Factories.h"
@@ -28,7 +28,7 @@ protected:
             [&] { status_ = mi->ft->enumerateInstances(mi, context(), result(), ref, nullptr); });
     }
 
-    // With a path that does not name the record by its key.
+    // Returns the trace of GetInstance for a path without the key of the record.
     Lines traceOfSearch(CMPIInstanceMI* mi)
     {
         const CMPIObjectPath* const ref = path("ANY_Class", {{"Other", "x"}}).handle();
@@ -36,7 +36,7 @@ protected:
             [&] { status_ = mi->ft->getInstance(mi, context(), result(), ref, nullptr); });
     }
 
-    // The answer stays open and the status as the factory left it.
+    // Expects an open result and the status that the factory set.
     void expectGivenUp() const
     {
         EXPECT_EQ(status_.rc, FailedEnumeration);
@@ -112,7 +112,7 @@ protected:
     {
     }
 
-    // That the association's provider gives up, with the text that both failures have.
+    // Expects the association's provider to end with the text that both failures have.
     void expectGivenUp(const Host::ObjectPath& source, const HandlerLines& handler)
     {
         CMPIStatus status = {CMPI_RC_OK, nullptr};

@@ -1,7 +1,7 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Enumerations that fail or find more than one capabilities instance, in place of the factory's
-// own, which never do.
+// Enumerations that fail or return several capabilities instances. They replace the factory's,
+// which never do.
 
 #include "tests/providers/FailingEnumerations.h"
 
@@ -17,7 +17,7 @@ namespace {
 
 int fail(std::vector<CMPIInstance*>& instances, CMPIStatus* rc)
 {
-    instances.push_back(nullptr); // to be returned to nobody
+    instances.push_back(nullptr); // not to be returned to the client
     *rc = {Testing::FailedEnumeration, nullptr};
     return 1;
 }
@@ -37,7 +37,8 @@ int SensorFactory::getAllSensorEnabledLogicalElementCapCMPIInstances(const CMPIB
     return fail(instances, rc);
 }
 
-// What else those files of the factory hold. Of paths there are two for each class.
+// The other functions of the replaced files. The enumerations of paths return two paths for each
+// class.
 
 namespace {
 

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Requests of many threads over hardware that changes under them.
+// Requests of many threads while the hardware changes.
 
 #include "host/broker/Array.h"
 #include "host/broker/Broker.h"
@@ -26,13 +26,13 @@ namespace HwmonRequestsTests {
 
 using Testing::BoundSysfs;
 
-constexpr const char* chip = "hwmon/hwmon1"; // the one that is unplugged
+constexpr const char* chip = "hwmon/hwmon1"; // the chip that is unplugged
 constexpr const char* chipsSensor = "/hwmon/nvme-pci-0200/temp1";
 constexpr std::uint64_t lostCommunication = 13;
 
 class HwmonRequestsTest : public Testing::MountNamespaceTest {
 protected:
-    // By device identifier.
+    // Returns the readings by device identifier.
     std::map<std::string, std::int64_t> readings()
     {
         Host::Request request(broker_);
@@ -84,7 +84,7 @@ TEST_F(HwmonRequestsTest, EightThreadsEnumerateTrueReadingsWhileChipsComeAndGo)
         const std::string unplugged = "unplugged" + std::to_string(time);
         sysfs.rename(chip, unplugged);
         std::this_thread::sleep_for(std::chrono::milliseconds(5));
-        // As in the kernel, what is plugged in again is a folder of its own.
+        // As in the kernel, a chip that is plugged in again has a new folder.
         std::filesystem::copy(sysfs.path(unplugged), sysfs.path("spare"),
             std::filesystem::copy_options::recursive |
                 std::filesystem::copy_options::copy_symlinks);

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// What holds of the requests of both classes whose instances are records.
+// The requests that are the same for both classes whose instances are records.
 
 #include "tests/providers/FaultyAssociation.h"
 #include "tests/providers/InstanceRequestsTest.h"
@@ -22,7 +22,7 @@ struct ProviderCase {
     const char* className;
     const char* provider;
     const char* key;
-    const char* value; // of the key of the one instance
+    const char* value; // of the key of the only instance
     InstanceFactory create;
 };
 
@@ -40,7 +40,7 @@ std::string nameOfCase(const ::testing::TestParamInfo<ProviderCase>& info)
     return info.param.name;
 }
 
-// ---- Requests to a broker that works ----
+// ---- Requests without faults ----
 
 class InstanceProviderTest : public InstanceRequestsTest, public WithParamInterface<ProviderCase> {
 protected:
@@ -56,7 +56,7 @@ protected:
         EXPECT_EQ(answer_.isDone(), isDone);
     }
 
-    // GetInstance with a result of its own.
+    // Calls GetInstance with a result of its own. Returns what it delivers.
     Host::CollectedResult got(const Host::ObjectPath& ref)
     {
         Host::CollectedResult found;
@@ -125,7 +125,7 @@ TEST_P(InstanceProviderTest, KeysWithoutTheIdentifierAreAClosedEmptyAnswer)
     EXPECT_TRUE(messages_.empty());
 }
 
-// Some object managers list every key of the class, those a client left out as null ones.
+// Some object managers pass every key of the class, with null for those that the client left out.
 TEST_P(InstanceProviderTest, AnIdentifierOfAnotherTypeCountsAsAbsent)
 {
     const Host::ObjectPath& inner = path(className_, {{GetParam().key, GetParam().value}});
@@ -156,7 +156,7 @@ TEST_P(InstanceProviderTest, TheBrokerOfTheLastFactoryCallIsUsed)
     EXPECT_EQ(other.count(BrokerCall::trace), 1U);
 }
 
-// ---- Requests to a broker that fails ----
+// ---- Requests with faults ----
 
 class InstanceProviderFaultTest : public FaultTest, public WithParamInterface<ProviderCase> {
 protected:
@@ -227,7 +227,7 @@ TEST_P(InstanceProviderFaultTest, AFailureWhoseMessageCannotBeMadeHasNone)
     EXPECT_EQ(request->status.msg, nullptr);
 }
 
-// A broker drops what the filter leaves out when it is set.
+// A broker may drop excluded properties at the moment in which the filter is set.
 TEST_P(InstanceProviderFaultTest, TheFilterIsSetBeforeTheProperties)
 {
     run(one(), {BrokerCall::setPropertyFilter, 1, FaultManner::errorStatus});

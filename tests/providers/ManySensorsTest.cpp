@@ -1,6 +1,7 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Counts have 16 bits: of more sensors than that, an association tells as many as the count says.
+// Counts have 16 bits. Where there are more sensors, an association returns as many as the
+// truncated count.
 
 #include "tests/providers/AssociationTest.h"
 
@@ -14,7 +15,7 @@ using ::testing::ElementsAre;
 constexpr const char* ElementCapabilities = "ZUMLO_SensorElementCapabilities";
 constexpr const char* SystemDevice = "ZUMLO_SensorSystemDevice";
 
-// Ordered as they are numbered.
+// Returns sensors whose identifiers are in the order of their numbers.
 std::vector<ScriptedNode> sensors(std::size_t count)
 {
     std::vector<ScriptedNode> nodes;
@@ -45,7 +46,8 @@ protected:
     }
 };
 
-// 256 sensors in each of 257 systems: 65,792 pairs, of which a 16-bit count says 256.
+// There are 256 sensors in each of 257 systems: 65,792 pairs, which a 16-bit count truncates to
+// 256.
 class SystemDeviceOfManyPairsTest : public AssociationTest {
 protected:
     SystemDeviceOfManyPairsTest()
@@ -101,7 +103,7 @@ TEST_F(SystemDeviceOfManyPairsTest, ASensorHasAsManyReferencesAsTheCountOfItsSys
     systems_.names = systems(65537);
     expectOk(references(sensor("F:/100000")));
     EXPECT_EQ(answer_.instances().size(), 1U);
-    expectOk(associatorNames(sensor("F:/100000"))); // handed over as they come
+    expectOk(associatorNames(sensor("F:/100000"))); // in the order of the enumeration
     EXPECT_EQ(answer_.paths().size(), 65537U);
 }
 

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// What lasts in a module from one factory call to the next: its broker, and nothing else.
+// The only state that a module keeps between requests: its broker, which the factory functions set.
 
 #include "tests/providers/Factories.h"
 #include "tests/support/ProviderTest.h"
@@ -31,7 +31,7 @@ constexpr Module ElementCapabilities = {"ElementCapabilities",
 constexpr Module SystemDevice = {"SystemDevice", SensorSystemDeviceProvider_Create_InstanceMI,
     SensorSystemDeviceProvider_Create_AssociationMI};
 
-// Another handle of the embedded broker; says which of them paths were asked of.
+// Another handle of the embedded broker. Records the handles through which paths are made.
 class RecordedBroker {
 public:
     explicit RecordedBroker(const CMPIBroker* broker) : functions_(*broker->eft), handle_(*broker)
@@ -49,7 +49,7 @@ public:
     RecordedBroker& operator=(const RecordedBroker&) = delete;
 
     const CMPIBroker* handle() const { return &handle_; }
-    // The brokers that paths were asked of since the last time.
+    // Returns the handles through which paths were made since the previous call.
     static std::vector<const CMPIBroker*> asked() { return std::exchange(asked_, {}); }
 
 private:
@@ -71,7 +71,7 @@ protected:
         mi->ft->referenceNames(mi, context(), result(), sensor(), nullptr, nullptr);
     }
 
-    // Every request asks its broker for a path at least once.
+    // Expects a request to make its paths, at least one, through the given broker.
     template <typename MI>
     void expectRequestOf(MI* mi, const RecordedBroker& broker)
     {

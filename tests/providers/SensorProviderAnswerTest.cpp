@@ -1,7 +1,7 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// How requests of ZUMLO_NumericSensor end: found by the whole path, closed before they are left,
-// or thrown out of.
+// The ends of requests of ZUMLO_NumericSensor: instances found by the whole path, results closed
+// before the exit mark, and exceptions.
 
 #include "tests/providers/ClosingResult.h"
 #include "tests/providers/Factories.h"
@@ -36,7 +36,7 @@ protected:
         return made;
     }
 
-    // Every kind of request, those that fail early included.
+    // Returns every kind of request, including those that fail early.
     std::vector<std::function<CMPIStatus(const CMPIResult*)>> requests()
     {
         CMPIInstanceMI* const mi =
@@ -62,7 +62,7 @@ protected:
 
 // ---- Found by the whole path ----
 
-// A broker that does not tell the device identifier when it is asked for it alone.
+// The broker fails to return the key DeviceID by its name.
 class SearchTest : public SensorProviderAnswerTest {
 protected:
     void get(const std::string& deviceID, const char** properties = nullptr)
@@ -109,14 +109,14 @@ TEST_F(SearchTest, NoInstanceIsFoundByThePathOfNone)
     EXPECT_TRUE(answer_.isDone());
 }
 
-// ---- Closed before they are left ----
+// ---- Results closed before the exit mark ----
 
 TEST_F(SensorProviderAnswerTest, TheResultIsClosedBetweenTheMarks)
 {
     const ScriptedMachine machine(ThreeSensors);
     auto all = requests();
     CMPIInstanceMI* const mi = SensorProfileProvider_Create_InstanceMI(broker(), nullptr, nullptr);
-    all.push_back([this, mi](const CMPIResult* into) { // has no keys
+    all.push_back([this, mi](const CMPIResult* into) { // a path without keys
         return mi->ft->getInstance(mi, context(), into, path(Class).handle(), nullptr);
     });
     for (const auto& request : all) {
@@ -130,7 +130,7 @@ TEST_F(SensorProviderAnswerTest, TheResultIsClosedBetweenTheMarks)
     }
 }
 
-// ---- Thrown out of ----
+// ---- Exceptions ----
 
 TEST_F(SensorProviderAnswerTest, AnExceptionThatIsNoStandardOneLeavesWithoutAnExitMark)
 {

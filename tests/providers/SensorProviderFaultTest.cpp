@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// What becomes of a request of ZUMLO_NumericSensor when the broker fails it.
+// The requests of ZUMLO_NumericSensor when calls of the broker fail.
 
 #include "tests/providers/Factories.h"
 #include "tests/providers/FaultyRequest.h"
@@ -20,7 +20,7 @@ const std::vector<ScriptedNode> TwoSensors = {{NodeType::Temperature, "/t", "CPU
 
 enum class Operation { names, instances, oneInstance, instanceByPath };
 
-// A request of the operation.
+// Returns the kind of request for an operation.
 RequestKind kindOf(Operation operation, const char** properties = nullptr)
 {
     const auto source = [operation](const Host::Request& request) -> Host::ObjectPath& {
@@ -92,7 +92,7 @@ TEST_P(PathFailureTest, AnInstanceWithoutAPathIsANullInstance)
     const auto request = run(Operation::instances, {BrokerCall::newObjectPath, 1, GetParam()});
     EXPECT_EQ(request->status.rc, CMPI_RC_OK);
     EXPECT_EQ(request->answer.instances().size(), 1U);
-    EXPECT_EQ(request->answer.refused(), 1U); // the null entry is passed on as it is
+    EXPECT_EQ(request->answer.refused(), 1U); // the null entry is passed to the result
     EXPECT_TRUE(request->answer.isDone());
     EXPECT_TRUE(request->messages.empty());
 }
@@ -126,7 +126,7 @@ protected:
         EXPECT_EQ(request.message(), statusText);
         EXPECT_THAT(
             request.messages, ElementsAre(BrokerMessage{2, "SensorProfileProvider", traceText}));
-        EXPECT_EQ(request.answer.instances().size(), 1U); // as far as it was built
+        EXPECT_EQ(request.answer.instances().size(), 1U); // with the properties set so far
         EXPECT_TRUE(request.answer.isDone());
     }
 
@@ -231,7 +231,7 @@ TEST_F(SensorProviderFaultTest, EveryRequestReturnsTheStatusThatTheBrokerLeft)
     EXPECT_TRUE(searched->answer.isDone());
 }
 
-// AddressSanitizer watches how far each is read.
+// The faulty broker reads whole values, so that AddressSanitizer reports one that is shorter.
 TEST_F(SensorProviderFaultTest, EveryValueIsWhole)
 {
     const auto request = FaultTest::run(kindOf(Operation::oneInstance), std::vector<Fault>{});
@@ -263,9 +263,9 @@ TEST_F(SensorProviderFaultTest, ALabelThatCannotBeMadeIsAnEmptyElement)
     }
 }
 
-// ---- What is ignored ----
+// ---- Failures that are ignored ----
 
-// Without the broker's filter the builder's own selection shows.
+// Without the broker's filter, only the builder selects properties.
 TEST_F(SensorProviderFaultTest, HealthStateBringsStatusAlong)
 {
     const char* properties[] = {"HealthState", nullptr};
@@ -287,7 +287,7 @@ TEST_F(SensorProviderFaultTest, SettingsThatFailAreIgnored)
     }
 }
 
-// A broker may forget the namespace that a path was made with.
+// A broker may not keep the namespace with which a path was made.
 TEST_F(SensorProviderFaultTest, EveryNameIsGivenItsNamespaceOnceMoreBeforeItIsReturned)
 {
     run(Operation::names, {BrokerCall::setNameSpace, 4, FaultManner::errorStatus});

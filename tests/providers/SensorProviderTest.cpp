@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The requests of ZUMLO_NumericSensor, from the object manager's side.
+// The requests of ZUMLO_NumericSensor, as an object manager sends them.
 
 #include "tests/providers/InstanceRequestsTest.h"
 
@@ -133,8 +133,8 @@ TEST_F(SensorProviderTest, AnInstanceHasTheListedProperties)
 
 TEST_F(SensorProviderTest, APathWithoutADeviceIDEqualsThatOfNoInstance)
 {
-    // The path of an instance has all four keys, so no path without a device identifier
-    // equals one.
+    // The path of an instance has all four keys, so that no path without a device identifier equals
+    // it.
     expectOk(get({{"CreationClassName", Class}, {"SystemCreationClassName", "ZUMLO_ComputerSystem"},
         {"SystemName", systemName_}}));
     EXPECT_TRUE(answer_.instances().empty());

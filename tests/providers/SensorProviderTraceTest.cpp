@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The trace lines of whole requests, line by line.
+// The trace lines of whole requests.
 
 #include "tests/providers/Factories.h"
 #include "tests/providers/RequestTrace.h"
@@ -24,7 +24,7 @@ protected:
     {
     }
 
-    // What one request writes, without the lines of the harvest.
+    // Returns the lines that one request writes, without those of the harvest.
     Lines traceOf(const std::vector<ScriptedNode>& nodes,
         const std::vector<std::pair<std::string, std::string>>& keys,
         CMPIStatus (*request)(

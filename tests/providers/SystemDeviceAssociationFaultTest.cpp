@@ -1,7 +1,7 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// What becomes of any request of ZUMLO_SensorSystemDevice when the broker fails it, and of those
-// for associated objects in detail.
+// The requests of ZUMLO_SensorSystemDevice when any call of the broker fails, and those for
+// associated objects in detail.
 
 #include "tests/providers/SystemDeviceFaultTest.h"
 
@@ -12,7 +12,7 @@ namespace SystemDeviceAssociationFaultTests {
 using namespace Testing;
 using namespace Testing::SystemDevice;
 
-// ---- Every call, every way ----
+// ---- Every call in every manner ----
 
 class SystemDeviceFaultSweepTest : public SystemDeviceFaultTest,
                                    public ::testing::WithParamInterface<RequestKind> {};
@@ -60,7 +60,7 @@ TEST_F(SystemDeviceAssociationFaultTest, ATargetThatCannotBeMadeIsNoTarget)
             }
 }
 
-// Whatever the broker said of the last text that was read on the way.
+// The broker may report a failure for the last text that the provider reads.
 TEST_F(SystemDeviceAssociationFaultTest, AResultClassThatIsNotServedIsAnsweredWithOk)
 {
     for (const SourceMaker& source : {Sensor, System}) {
@@ -121,7 +121,7 @@ TEST_F(SystemDeviceAssociationFaultTest, AnAssociatorThatCannotBeMadeIsPassedOnA
     }
 }
 
-// The status of the request is not handed over where an instance is asked for its path.
+// The status of the request is not passed to the call that returns the path of an instance.
 TEST_F(SystemDeviceAssociationFaultTest, APathThatIsNotToldLeavesTheStatus)
 {
     const Fault fault = {BrokerCall::getObjectPath, 2, FaultManner::nullResult}; // the last

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// What ZUMLO_SensorSystemDevice leads to, from either end.
+// The requests along ZUMLO_SensorSystemDevice, from either end.
 
 #include "tests/providers/AssociationTest.h"
 
@@ -31,7 +31,7 @@ protected:
         return AssociationTest::pairs("GroupComponent", "PartComponent");
     }
 
-    // How many objects a request with this result class is answered with.
+    // Returns the number of objects that a request with this result class returns.
     std::size_t countOf(const Host::ObjectPath& source, const char* resultClass, bool wantsPaths)
     {
         Host::CollectedResult found;
@@ -77,7 +77,7 @@ TEST_F(SystemDeviceAssociationTest, ASensorIsAssociatedWithEverySystem)
     EXPECT_THAT(delivered(), ElementsAre("host", "guest"));
     ASSERT_EQ(answer_.instances().size(), 2U);
     EXPECT_EQ(answer_.instances()[0]->className(), SystemClass);
-    EXPECT_EQ(answer_.instances()[0]->objectPath().nameSpace(), "root/elsewhere"); // as they came
+    EXPECT_EQ(answer_.instances()[0]->objectPath().nameSpace(), "root/elsewhere"); // unchanged
     EXPECT_FALSE(answer_.isDone());
     EXPECT_THAT(messages_, ElementsAre(LeadsToSystems));
     ASSERT_EQ(systems_.calls.size(), 1U);
@@ -244,7 +244,7 @@ TEST_F(SystemDeviceAssociationTest, ReferencesOfASensorPairItWithEverySystem)
     expectOk(references(source));
     EXPECT_THAT(pairs(), ElementsAre("host D:/4", "guest D:/4"));
     ASSERT_EQ(answer_.instances().size(), 2U);
-    EXPECT_THAT(describe(answer_.instances()[0]->properties()), // the system as it came
+    EXPECT_THAT(describe(answer_.instances()[0]->properties()), // the unchanged system
         ElementsAre("GroupComponent = ref " + system("host", "root/elsewhere").toText(),
             "PartComponent = ref " + source.toText()));
     EXPECT_FALSE(answer_.isDone());
@@ -293,7 +293,7 @@ TEST_F(SystemDeviceAssociationTest, ReferencesOfAnotherSourceHaveNoTarget)
     expectNothing(false);
 }
 
-// ---- Up-calls that fail or answer strangely ----
+// ---- Up-calls that fail or return unusual elements ----
 
 TEST_F(SystemDeviceAssociationTest, ARefusedUpcallIsTheAnswer)
 {

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// What becomes of the instances of ZUMLO_SensorSystemDevice when the broker fails a request.
+// The instances of ZUMLO_SensorSystemDevice when calls of the broker fail.
 
 #include "tests/providers/SystemDeviceFaultTest.h"
 
@@ -16,8 +16,7 @@ const std::string Gap(21, ' ');
 
 class SystemDeviceInstanceFaultTest : public SystemDeviceFaultTest {
 protected:
-    // That the builder reports a failure so, within a request that answers as if nothing had
-    // been there.
+    // Expects this report of a failure by the builder, and an empty result with status OK.
     void expectBuilderFailure(const Fault& fault, const std::string& statusText,
         const std::string& traceText, bool hasExitMark)
     {
@@ -33,7 +32,7 @@ protected:
         }
     }
 
-    // That the enumeration of names ends with a status of its own, in an open result.
+    // Expects the enumeration of names to end with this status and an open result.
     std::unique_ptr<FaultyRequest> expectNamesFailure(const Fault& fault,
         const std::string& statusText, const std::string& traceText, bool hasExitMark)
     {
@@ -47,8 +46,8 @@ protected:
     }
 };
 
-// ---- The walk over all pairs. Paths are made in this order: the class of systems, then for each
-// ---- system both sensors and their associations. ----
+// ---- The iteration over all pairs. Paths are made in this order: the class of systems, then for
+// ---- each system both sensors and their associations. ----
 
 constexpr unsigned SystemPath = 1;
 constexpr unsigned FirstSensor = 2;

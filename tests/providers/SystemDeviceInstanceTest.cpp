@@ -28,7 +28,7 @@ protected:
     {
     }
 
-    // That the one up-call came with the request's context, for the class of systems.
+    // Expects one up-call, with the request's context, for the class of systems.
     void expectUpcall(const std::string& path)
     {
         ASSERT_EQ(systems_.calls.size(), 1U);
@@ -77,7 +77,7 @@ TEST_F(SystemDeviceInstanceTest, ANameIsAPathInTheRequestsNamespaceOnThisSystem)
     EXPECT_EQ(fifth.className(), Class);
     EXPECT_EQ(fifth.nameSpace(), "root/other");
     EXPECT_EQ(fifth.host(), systemName_);
-    EXPECT_THAT(describe(fifth.keys()), // the system in the request's namespace, too
+    EXPECT_THAT(describe(fifth.keys()), // the system is in the request's namespace, too
         ElementsAre("GroupComponent = ref " + system("guest", "root/other").toText(),
             "PartComponent = ref " + sensor("B:/2", "root/other").toText()));
 }
@@ -152,7 +152,7 @@ TEST_F(SystemDeviceInstanceTest, InstancesArePairsSystemBySystem)
 
 TEST_F(SystemDeviceInstanceTest, TheFilterKeepsBothReferencesWhateverTheListNames)
 {
-    broker_.setClassInformation(nullptr); // so that the filter's own keys are known alone
+    broker_.setClassInformation(nullptr); // so that only the keys of the filter are known
     const char* properties[] = {"Nothing", nullptr};
     expectOk(enumerate(path(Class), properties));
     ASSERT_EQ(answer_.instances().size(), 6U);

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The trace lines of whole requests of ZUMLO_SensorSystemDevice, line by line.
+// The trace lines of whole requests of ZUMLO_SensorSystemDevice.
 
 #include "tests/providers/AssociationTest.h"
 #include "tests/providers/RequestTrace.h"
@@ -45,7 +45,7 @@ protected:
     SystemDeviceEmptyTraceTest() : SystemDeviceTraceTest({}) {}
 };
 
-// ---- Instances. The sensors are fetched anew for each of the two systems. ----
+// ---- Instances. The sensors are fetched for each of the two systems. ----
 
 const Lines Fetched = sequence({counted(), SensorPaths});
 
@@ -82,7 +82,7 @@ TEST_F(SystemDeviceTraceTest, OfEnumeratedInstances)
             Fetched, Builder.exit(), lines.exit()})));
 }
 
-// A builder that breaks off leaves its exit mark out.
+// A builder that fails writes no exit mark.
 TEST_F(SystemDeviceTraceTest, OfInstancesWithoutAnybodyToServeSystems)
 {
     systems_.refusal = CMPI_RC_ERR_NOT_SUPPORTED;

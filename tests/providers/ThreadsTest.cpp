@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// An object manager makes an association MI when it is first asked for associations: while
+// An object manager creates an association MI for the first request along associations, while other
 // requests to the same module run.
 
 #include "host/broker/Broker.h"

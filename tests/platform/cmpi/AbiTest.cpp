@@ -1,7 +1,7 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The CMPI headers describe a binary interface: every offset, size and constant is compared
-// with a table of the interface's facts.
+// The CMPI headers describe a binary interface. Each offset, size and constant is compared with a
+// table.
 
 #include <cmpidt.h>
 #include <cmpift.h>
@@ -22,7 +22,7 @@ TEST(CmpiAbiTest, EveryMemberStandsAtItsOffset)
 #undef MEMBER
 }
 
-// An installed header set may spell a handle's constness differently; ours must be exact.
+// Installed header sets may differ in the constness of handles; the project's is exact.
 #ifdef SENSOR_PROFILE_OWN_CMPI_HEADERS
 TEST(CmpiAbiTest, EveryMemberHasItsType)
 {

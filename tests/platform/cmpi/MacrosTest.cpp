@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The convenience functions accept what is missing.
+// The convenience functions accept null arguments.
 
 #include <cmpimacs.h>
 

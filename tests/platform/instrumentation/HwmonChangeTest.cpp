@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Chips that come and go, and a configuration that changes, while somebody is reading.
+// Chips that appear and disappear, and a configuration that changes, while threads read.
 
 #include "platform/instrumentation/hwmon/HwmonSource.h"
 #include "tests/platform/instrumentation/HwmonMachine.h"
@@ -75,7 +75,7 @@ TEST_F(HwmonChangeTest, AListedNodeWhoseChipVanishedIsLost)
     sysfs.remove(nvme);
     EXPECT_EQ(source.read(nodes[2]).status, 13U);
     EXPECT_FALSE(source.read(nodes[2]).reading);
-    walk(); // the list is made anew, without the chip
+    walk(); // the list is renewed without the chip
     EXPECT_EQ(source.read(nodes[2]), Vorn::NodeReading{.status = 13});
     EXPECT_EQ(source.read(nodes[0]).reading, 44.0);
 }
@@ -123,7 +123,7 @@ TEST_F(HwmonChangeTest, TwoCursorsOnOneThreadDoNotBlockEachOther)
     EXPECT_EQ(second.getNodeStatus(), 1U);
 }
 
-// What the tree says; a lost node shows no reading.
+// Returns the reading that is in the tree; nothing for a lost node.
 std::optional<double> expectedReading(const Testing::SeenNode& node)
 {
     static const std::map<std::string, double> readings{{"/hwmon/coretemp-isa-0000/temp1", 44.0},

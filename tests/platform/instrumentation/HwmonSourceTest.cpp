@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The hwmon source over attributes that a test writes down.
+// The hwmon source with attributes that a test defines.
 
 #include "platform/instrumentation/hwmon/HwmonSource.h"
 #include "tests/platform/instrumentation/HwmonMachine.h"
@@ -90,9 +90,9 @@ TEST_F(HwmonTest, TheAverageStandsInWhereThereIsNoInput)
         nodeOf({{"in1_average", "3300"}, {"in1_input", "none"}}).values.reading, std::nullopt);
 }
 
-// libsensors opens the attribute at every reading. These are the ways in which that can fail
-// without a driver's help: it says "Kernel interface error" where the file cannot be opened, and
-// "Can't read" where it holds no number or reading it fails.
+// libsensors opens the attribute at each reading. Its error is "Kernel interface error" where the
+// file cannot be opened, and "Can't read" where it contains no number or cannot be read. These are
+// the failures that need no driver.
 TEST_F(HwmonTest, AnAttributeThatCannotBeReadNowIsLostNow)
 {
     OneChip chip(Attributes{{"temp1_input", "50000"}});
@@ -187,7 +187,7 @@ TEST_F(HwmonTest, AWrongConfigurationIsReportedOnceAndTheRestHolds)
     configuration().write("chip \"testchip-*\"\n  label temp1 \"Board\"\n  nonsense here\n");
     OneChip chip(Attributes{{"temp1_input", "20000"}});
     EXPECT_EQ(only(walk()).description, "Board");
-    chip.sysfs().addChip("hwmon7", "other", "platform", "other.1"); // the list is made anew
+    chip.sysfs().addChip("hwmon7", "other", "platform", "other.1"); // the list is renewed
     walk();
     ASSERT_THAT(capture.log(), SizeIs(1));
     EXPECT_THAT(capture.log()[0].text, HasSubstr("/etc/sensors3.conf:3: "));

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// What the hwmon source makes of alarms, faults and limits.
+// The statuses that the hwmon source derives from alarms, faults and limits.
 
 #include "tests/platform/instrumentation/HwmonMachine.h"
 

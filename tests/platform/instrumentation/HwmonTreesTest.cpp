@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The statuses of captured machines, channel by channel.
+// The status of each channel of captured machines.
 
 #include "tests/platform/instrumentation/HwmonMachine.h"
 
@@ -13,7 +13,7 @@ using Testing::HwmonTest;
 
 using HwmonTreesTest = HwmonTest;
 
-// The channels that are not normal, by path.
+// Returns the statuses that are not normal, by path.
 std::map<std::string, unsigned> statusesBesideNormal()
 {
     std::map<std::string, unsigned> statuses;

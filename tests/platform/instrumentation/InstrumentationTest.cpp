@@ -26,7 +26,7 @@ using Vorn::Instrumentation;
 using Vorn::NodeLexicon::NodeType;
 using Vorn::NodeLexicon::Properties;
 
-// Counts its readings, so that every one differs from the others.
+// Its readings are a counter, so that each differs from the others.
 class CountingSource final : public Vorn::Source {
 public:
     std::vector<Vorn::Node> nodes(NodeType type) override
@@ -195,7 +195,7 @@ TEST(CursorTest, IsUsedOnManyThreadsAtOnce)
         });
 }
 
-// Three cursors, as one request builds them; a failure of one does not keep the next from work.
+// Uses three cursors as a request does. The failure of one does not prevent the next.
 void request()
 {
     for (const NodeType type : {NodeType::Temperature, NodeType::Voltage, NodeType::Tachometer})
@@ -217,7 +217,7 @@ std::vector<std::string> textsOf(const LogCapture& capture)
     return texts;
 }
 
-// A failure that an earlier test left on record would not be reported.
+// Clears the recorded failures after each test, since a recorded failure is not reported again.
 class FailureTest : public testing::Test {
 protected:
     void TearDown() override

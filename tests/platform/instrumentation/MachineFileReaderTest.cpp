@@ -27,7 +27,7 @@ using Vorn::MachineFileNode;
 using Vorn::readMachineFile;
 using Vorn::NodeLexicon::NodeType;
 
-// A document with one node that has the required members and these.
+// Returns a document with one node, which has the required and the given members.
 std::string nodeWith(const std::string& members)
 {
     return R"({"nodes":[{"type":"voltage","path":"/v","description":"V")" +
@@ -107,7 +107,7 @@ void compileCommaLocale(const Testing::TemporaryFolder& folder)
         folder.write("source", "LC_NUMERIC\ndecimal_point \"<U002C>\"\nthousands_sep \"<U002E>\"\n"
                                "grouping 3;3\nEND LC_NUMERIC\n");
     const std::string target = folder.path() / "comma";
-    // It warns about the categories that are missing and ends with 1.
+    // localedef warns about missing categories and exits with 1.
     std::ignore =
         std::system(("localedef -c -i " + source + " " + target + " > /dev/null 2>&1").c_str());
     if (!std::filesystem::exists(target + "/LC_NUMERIC"))

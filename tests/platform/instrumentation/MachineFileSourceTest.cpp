@@ -39,7 +39,7 @@ std::string modelOf(const std::string& description)
            "\"}]}";
 }
 
-// Longer than a file must have rested before it is kept.
+// Waits longer than the minimum age of a file that is cached.
 void letItRest()
 {
     std::this_thread::sleep_for(std::chrono::milliseconds(80));
@@ -193,7 +193,7 @@ TEST_F(MachineFileSourceTest, ThatIsTooLargeIsRefusedUnread)
         "model file " + path() + ": Larger than 67108864 bytes");
 }
 
-// Root may read everything, so a child that is nobody tries.
+// Root may read every file, so that a child process of the user nobody reads it.
 TEST_F(MachineFileSourceTest, ThatMayNotBeReadIsNamed)
 {
     write(modelOf("secret"));

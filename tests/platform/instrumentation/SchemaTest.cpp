@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The files that describe models to people and tools, against the reader.
+// The JSON schema and the demonstration model, compared with the reader.
 
 #include "platform/instrumentation/SourceList.h"
 #include "platform/instrumentation/hwmon/Status.h"
@@ -68,7 +68,7 @@ TEST(SchemaTest, NumbersAreTheNumbersOfTheReader)
     EXPECT_EQ(schema().at("/$defs/code/maximum"_json_pointer), 4294967295U);
 }
 
-// Every sensor's status is what its reading and its limits make it.
+// The status of each sensor agrees with its reading and limits.
 TEST(DemoModelTest, IsConsistent)
 {
     for (const SeenNode& node : demoMachine()) {

@@ -17,7 +17,7 @@ using Testing::EnvironmentVariable;
 using Vorn::Locale;
 using Vorn::ResourceString;
 
-// What a request publishes in the given language.
+// Returns the text that a request publishes in the language of the locale.
 std::string published(const std::string& locale, const std::wstring& id, const std::string& name)
 {
     const EnvironmentVariable language("LC_ALL", locale);

@@ -1,7 +1,7 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// What a process sees that never calls configure. Each statement runs in a process of its own,
-// begun afresh, since the configuration takes effect only once.
+// The log of a process that never calls configure(). Each statement runs in a new process, since
+// the configuration takes effect only once.
 
 #include "tests/platform/logging/LogFile.h"
 #include "tests/platform/logging/SyslogCapture.h"
@@ -41,7 +41,7 @@ TEST_F(FirstUseTest, ALineFindsTheChannelsOfTheEnvironment)
             set("4000", "stderr", "stderr");
             logLine("mark", 4000);
             traceLine("parameters", 3000);
-            std::exit(0); // unloading runs too
+            std::exit(0); // destructors of static objects run, too
         },
         testing::ExitedWithCode(0), "^[^ ]+Z log 4000 Nimbrel.Sensor [^ ]+ mark\n$");
 }

@@ -15,7 +15,7 @@ using Testing::EnvironmentVariable;
 using testing::HasSubstr;
 using testing::SizeIs;
 
-// What the three variables lead to, given in the order level, log, trace.
+// Returns the settings for the values of the three variables in the order level, log, trace.
 RynLog::LogSettings configured(
     const std::string& level, const std::string& log, const std::string& trace)
 {

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// What a provider library looks like to the process that loads it: it logs, and goes.
+// A library that writes to the log and is unloaded, as a provider library is.
 
 #include "platform/logging/LogSettings.h"
 #include "platform/logging/RynLogger.h"

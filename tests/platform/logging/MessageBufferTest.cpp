@@ -110,7 +110,7 @@ TEST(MessageBufferTest, PrintsANullTextAsNull)
     EXPECT_EQ(buffered(static_cast<char*>(nullptr)), "(null)");
 }
 
-// Digits grouped as some languages group them.
+// Groups digits as some languages do.
 class Grouping : public std::numpunct<char> {
 protected:
     char do_thousands_sep() const override { return '.'; }

@@ -168,7 +168,7 @@ TEST(StandardErrorSinkTest, ABrokenPipeDoesNotEndTheProcess)
     ASSERT_GE(::dup2(ends[1], STDERR_FILENO), 0);
     {
         const ScopedLogSettings settings({6000, "stderr", "off"});
-        logLine("lost"); // SIGPIPE has its default action here: the end
+        logLine("lost"); // SIGPIPE would terminate this process
     }
     ::dup2(standardError, STDERR_FILENO);
     ::close(standardError);

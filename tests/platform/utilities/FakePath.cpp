@@ -8,7 +8,7 @@ namespace Testing {
 
 namespace {
 
-// The double behind an object, whatever constness the headers give handles.
+// Returns the double behind an object; the header sets differ in the constness of handles.
 template <typename Double, typename Object>
 Double& behind(const Object* object)
 {

@@ -18,7 +18,7 @@ using Vorn::isObjPathsEqual;
 constexpr auto sensorClass = "ZUMLO_NumericSensor";
 const CMPIData yes = valueOf(CMPI_boolean, CMPIBoolean{1});
 
-// Equality has no direction: both are tried.
+// Returns whether the paths are equal, and expects the same for the reverse order.
 bool equal(const FakePath& a, const FakePath& b, bool comparesReferences = true)
 {
     const bool forward = isObjPathsEqual(a.get(), b.get(), comparesReferences);
@@ -26,7 +26,7 @@ bool equal(const FakePath& a, const FakePath& b, bool comparesReferences = true)
     return forward;
 }
 
-// Whether two paths are equal that differ in nothing but one key's value.
+// Returns whether two paths are equal whose only difference is the value of a key.
 bool equalValues(const CMPIData& a, const CMPIData& b)
 {
     FakePath pathA("root", sensorClass), pathB("root", sensorClass);
@@ -339,7 +339,7 @@ TEST_F(ReferencesTest, ToHandlelessPathsEqualNothing)
     EXPECT_FALSE(equal(a, b, true));
 }
 
-// A chain of paths, each of which refers to the next.
+// Returns whether a chain of paths, each of which refers to the next, equals itself.
 bool equalChains(int references)
 {
     std::deque<FakePath> chain;
