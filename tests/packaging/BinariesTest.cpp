@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// What the installed binaries export, what they need, and how they are hardened.
+// The exports, dependencies and hardening of the installed binaries.
 
 #include "tests/packaging/Installation.h"
 #include "tests/support/ExportedNames.h"
@@ -28,7 +28,7 @@ std::string readelf(const std::string& options, const std::string& name)
     return outputOf("readelf --wide " + options + " '" + installedFile(name) + "'");
 }
 
-// Without the version of their interface, such as libfmt.
+// Returns the names of the needed libraries without versions, such as libfmt.
 std::set<std::string> neededLibraries(const std::string& name)
 {
     static const std::regex needed(R"(\(NEEDED\) +Shared library: \[([^.]+)\.so)");
@@ -90,7 +90,7 @@ TEST(InstalledLibraryTest, ExportsItsFactoriesAndNothingElse)
         UnorderedElementsAre("ComputerSystemProvider_Create_InstanceMI"));
 }
 
-// An object manager pays for every library that a provider draws in.
+// An object manager loads every library that a provider depends on.
 TEST(InstalledLibraryTest, NeedsNothingOfTheServer)
 {
     const std::set<std::string> common = {

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// What bash offers after a part of a command line of sensorctl.
+// The completions of bash for command lines of sensorctl.
 
 #include "tests/packaging/Installation.h"
 #include "tests/tools/ToolTest.h"
@@ -15,7 +15,7 @@ using testing::ElementsAre;
 using testing::StartsWith;
 using namespace Testing;
 
-// The words up to the one that is being typed, which comes last.
+// Returns the completions of the last word.
 std::vector<std::string> offersFor(const std::vector<std::string>& words)
 {
     const std::string script = R"(

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// An installation, moved from where it was put, works from its own place.
+// An installation that was moved to another folder works there.
 
 #include "tests/packaging/Installation.h"
 #include "tests/support/ExportedNames.h"
@@ -96,7 +96,7 @@ TEST(InstalledTest, ToolFollowsTheAssociationsThroughBothLibraries)
     EXPECT_THAT(ended.out, HasSubstr("PSU 2 Fan"));
 }
 
-// Distributions differ in the name of the folder of libraries.
+// The name of the folder of libraries differs between distributions.
 TEST(InstalledTest, LibrariesAreFoundInEveryFolderOfLibraries)
 {
     const TemporaryFolder folder;
@@ -125,7 +125,7 @@ TEST(InstalledTest, LibrariesAreFoundInEveryFolderOfLibraries)
     }
 }
 
-// The service, installed for a prefix below another root.
+// The service, installed to a prefix below another root (DESTDIR).
 class InstalledServiceTest : public testing::Test {
 protected:
     void installFor(const std::string& prefix) const
@@ -180,7 +180,7 @@ TEST_F(InstalledServiceTest, HasThePathsOfItsPrefix)
     }
 }
 
-// The unit hides homes from the service.
+// The unit hides home folders from the service.
 TEST_F(InstalledServiceTest, IsNotInstalledWhereItCannotStart)
 {
     for (const char* const prefix : {"/home/somebody/sensors", "/root/sensors", "/root"})
@@ -188,7 +188,7 @@ TEST_F(InstalledServiceTest, IsNotInstalledWhereItCannotStart)
     EXPECT_THAT(files(), testing::IsEmpty());
 }
 
-// What a unit would have to quote.
+// A unit would have to quote the characters of such a prefix.
 TEST_F(InstalledServiceTest, IsNotInstalledBelowAnOddPrefix)
 {
     for (const char* const prefix : {"/srv/our sensors", "/srv/100%", "/srv/$HOME"})
@@ -209,7 +209,7 @@ TEST_F(InstalledServiceTest, HasWholePathsBelowARelativePrefix)
                   "/etc/sensor-profile/serve.conf\n"));
 }
 
-// Several can install from one build at the same time, and others than its owner can.
+// Several processes, and other users than its owner, can install from one build at the same time.
 TEST_F(InstalledServiceTest, IsNotMadeInTheBuild)
 {
     const auto inTheBuild = [] {
@@ -231,7 +231,8 @@ TEST_F(InstalledServiceTest, SeesTheTemporaryFolderThatItIsTriedIn)
         HasSubstr("\nPrivateTmp=no\n"));
 }
 
-// By a script of its own: the build's list is that of whichever installation was the last.
+// A script of the test installs it, since the list in the build folder is that of the last
+// installation.
 TEST_F(InstalledServiceTest, IsInTheListOfWhatIsInstalled)
 {
     const std::string script = folder_.write("script.cmake",
@@ -261,8 +262,8 @@ TEST_F(InstalledServiceTest, HasAUnitThatSystemdUnderstands)
         "");
 }
 
-// By systemd's own measure, in tenths: what is left is that it has a network, sees the host's
-// name, and lets the administrator choose whom to answer.
+// systemd-analyze rates the exposure, here in tenths. What remains is the network, the host name,
+// and addresses that the administrator chooses.
 TEST_F(InstalledServiceTest, IsShutInAsFarAsItCanBe)
 {
     const std::string verdict = outputOf(
@@ -283,7 +284,7 @@ TEST(InstalledTest, NothingNamesTheBuildTheSourcesOrTheFirstPrefix)
 {
     for (const std::string& name : filesBelow(movedInstallation())) {
         if (name.ends_with(".service") || name.ends_with(".conf"))
-            continue; // the service needs whole paths
+            continue; // the service needs absolute paths
         const std::string content = contentOf(movedInstallation() / name);
         EXPECT_THAT(content.find(SENSOR_PROFILE_BINARY_DIR), std::string::npos) << name;
         EXPECT_THAT(content.find(SENSOR_PROFILE_SOURCE_DIR), std::string::npos) << name;

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The manual pages are well written, and name what there is.
+// The manual pages are well formed, and name the options and properties that exist.
 
 #include "tests/packaging/Installation.h"
 #include "tests/support/ExportedNames.h"
@@ -47,7 +47,7 @@ INSTANTIATE_TEST_SUITE_P(ManualPages, ManualPageTest,
     testing::Values(
         "sensorctl.1", "sensor-profile-model.5", "sensor-profile.7", "sensor-profile-register.8"));
 
-// The help of the tool, then that of each of its commands.
+// Returns the help of the tool and of each of its commands, by the name of the command.
 std::map<std::string, std::string> helpByCommand()
 {
     static const std::regex command("\n  ([a-z]+) +[A-Z]");
@@ -81,7 +81,7 @@ TEST(ManualOfTheToolTest, HasTheDefaultsOfTheServer)
             << each->str();
 }
 
-// What the file shows as settings are options, the ports with the values they have without it.
+// The settings in the file are options, and the ports have their default values.
 TEST(SettingsOfTheServiceTest, AreOptionsOfTheServer)
 {
     static const std::regex setting("#([a-z-]+) = (.*)");
@@ -120,8 +120,8 @@ TEST(ManualOfTheModelTest, HasTheMembersOfTheSchema)
         EXPECT_THAT(page, HasSubstr(name));
 }
 
-// The row of each status of a model file in the tables of the operations page; one row may be for
-// several of them.
+// The row of each status of a model file in the tables of docs/operations.md; a row may be for
+// several statuses.
 const std::string meaninglessStatus = "has a status that means nothing";
 const std::map<unsigned, std::string> rowsOfStatuses = {{0, "has no status"},
     {1, "is within its limits"}, {2, "starts"}, {3, "starts"}, {8, "is dormant"},
@@ -131,7 +131,7 @@ const std::map<unsigned, std::string> rowsOfStatuses = {{0, "has no status"},
     {23, "reached a lower or upper limit of the first"}, {24, "is beyond a limit"},
     {25, "reached a limit of the second"}, {26, "reached a limit of the second"}};
 
-// In a list such as "1 normal, 12 offline".
+// Returns the codes in a list such as "1 normal, 12 offline".
 std::vector<unsigned> codesIn(const std::string& list)
 {
     static const std::regex code("([0-9]+) +[a-z]+ ?[a-z]*[,.]");
@@ -157,7 +157,7 @@ TEST(ManualOfTheModelTest, HasTheStatusesOfTheOperationsPage)
         codesIn(schema.at("/$defs/node/properties/status/description"_json_pointer)), expected);
 }
 
-// What a sensor with a status of the model file shows.
+// Returns the properties of a sensor with a status of the model file.
 nlohmann::json shownWith(unsigned status)
 {
     const TemporaryFolder files;
@@ -174,7 +174,7 @@ TEST(ManualOfTheClassesTest, LinksToTheOperationsPage)
         HasSubstr(" /usr/share/doc/sensor-profile-provider/operations.md"));
 }
 
-// Each state's row in the tables, against what a sensor with such a status shows.
+// The row of each state in the tables agrees with the properties of a sensor with that status.
 TEST(OperationsPageTest, HasTheStatesThatSensorsShow)
 {
     const std::string page = contentOf(SENSOR_PROFILE_SOURCE_DIR "/docs/operations.md");
@@ -192,7 +192,7 @@ TEST(OperationsPageTest, HasTheStatesThatSensorsShow)
     }
 }
 
-// From a text to the next of these texts.
+// Returns the part of a page between a text and the next match of an expression.
 std::string partOf(const std::string& page, const std::string& start, const std::regex& next)
 {
     const auto begin = page.find(start);
@@ -204,7 +204,7 @@ std::string partOf(const std::string& page, const std::string& start, const std:
     return std::regex_search(rest, end, next) ? end.prefix().str() : rest;
 }
 
-// Every property that is published is told of where its class is.
+// Each published property is named in the section of its class.
 TEST(OperationsPageTest, TellsOfEveryProperty)
 {
     const std::map<std::string, std::string> starts = {{"ZUMLO_NumericSensor", "\nA sensor, "},

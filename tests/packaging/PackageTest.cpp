@@ -19,7 +19,7 @@ const std::string packaging = SENSOR_PROFILE_SOURCE_DIR "/packaging/";
 
 class PackagesTest : public testing::Test {
 protected:
-    // Made by somebody who is cautious.
+    // The packages are made with a restrictive umask.
     static void SetUpTestSuite()
     {
         const Ended ended =
@@ -74,7 +74,7 @@ TEST_F(PackagesTest, CanBeReadByEverybody)
     }
 }
 
-// What Debian wants of each package, and a plain installation does not have.
+// Debian requires files of each package that a plain installation does not have.
 TEST_F(PackagesTest, SaySomethingOfThemselves)
 {
     for (const std::string package : {"sensor-profile", "sensor-profile-provider"}) {
@@ -98,7 +98,7 @@ TEST_F(PackagesTest, HaveTheVersionOfTheirLogOfChanges)
     }
 }
 
-// Those of the whole source tree.
+// shellcheck reads all scripts of the source tree.
 TEST(ScriptsTest, AreFreeOfWarnings)
 {
     const std::string complaints = outputOf(

@@ -111,7 +111,7 @@ std::map<std::string, std::string> environmentWith(
     return variables;
 }
 
-// What posix_spawn does to the child's descriptors.
+// The actions of posix_spawn on the child's descriptors.
 class Actions {
 public:
     Actions() { check(::posix_spawn_file_actions_init(&actions_)); }
@@ -154,8 +154,8 @@ void directOutput(Actions& actions, const RunOptions& options, const Pipe& pipe)
     }
 }
 
-// Appends what there is to read; false at the end. A terminal whose other side has gone away
-// answers with an error, which is its end.
+// Appends the available bytes. Returns false at the end, which a terminal reports as an error when
+// its other side is closed.
 bool readSome(int descriptor, std::string& text)
 {
     std::array<char, 65536> piece{};
@@ -165,7 +165,7 @@ bool readSome(int descriptor, std::string& text)
     return length > 0;
 }
 
-// Until both are at their end.
+// Reads both descriptors to their ends.
 void readBoth(int first, std::string& firstText, int second, std::string& secondText)
 {
     std::array<pollfd, 2> waiting = {pollfd{first, POLLIN, 0}, pollfd{second, POLLIN, 0}};

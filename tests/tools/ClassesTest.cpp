@@ -70,7 +70,7 @@ TEST_F(ClassesTest, TableOfAnAssociationNamesBothEndsShortly)
 TEST_F(ClassesTest, TableOfASuperclassNamesEachObjectsClass)
 {
     const auto lines = linesOf(listed("CIM_ManagedElement").out);
-    ASSERT_EQ(lines.size(), 8U); // with its title
+    ASSERT_EQ(lines.size(), 8U); // with the line of titles
     EXPECT_THAT(lines[0], testing::EndsWith("CLASS"));
     EXPECT_THAT(lines[7], testing::EndsWith("ZUMLO_ComputerSystem"));
 }

@@ -1,7 +1,7 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The machine that people are shown when their own has no sensors. The golden output is what
-// `COLUMNS=80 sensorctl list --model schema/demo-model.json` prints.
+// The demonstration machine, which is shown where a machine has no sensors. The expected output is
+// that of `COLUMNS=80 sensorctl list --model schema/demo-model.json`.
 
 #include "tests/tools/ToolTest.h"
 #include "tools/output/Utf8.h"

@@ -167,7 +167,7 @@ TEST_F(FailureTest, ProviderOptionTakesAnyPath)
     const std::string relative = std::filesystem::relative(sensorLibrary).string();
     EXPECT_EQ(run({"list", "--model", smallModel(), "--provider", relative}).code, 0);
     const Ended ended = run({"list", "--model", smallModel(), "--provider", "libc.so.6"});
-    EXPECT_EQ(ended.code, 1); // looked for here, not among the system's libraries
+    EXPECT_EQ(ended.code, 1); // looked for here, not among the system libraries
     EXPECT_THAT(ended.err, HasSubstr("/libc.so.6: cannot open shared object file"));
     EXPECT_EQ(run({"walk", "--model", smallModel(), "--provider", systemLibrary}).err,
         "sensorctl: " + systemLibrary + ": no factory SensorProfileProvider_Create_InstanceMI\n");

@@ -37,7 +37,7 @@ protected:
     Testing::TemporaryFolder folder_;
 };
 
-// The largest file this process may write, for as long as it lives.
+// Limits the size of files that this process writes during its lifetime.
 class FileSizeLimit {
 public:
     explicit FileSizeLimit(rlim_t size)

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// What the tool prints of captured machines against what `sensors -j` reads from them.
+// The output of the tool on captured machines, compared with that of `sensors -j`.
 
 #include "tests/support/MountNamespace.h"
 #include "tests/tools/ToolTest.h"
@@ -17,7 +17,7 @@ namespace {
 using nlohmann::json;
 using namespace Testing;
 
-// One channel as `sensors -j` shows it: subfeatures by the part of their name after "temp1_".
+// One channel in the output of `sensors -j`: subfeatures by the part of their name after "temp1_".
 struct Channel {
     std::string label;
     std::map<std::string, double> values;
@@ -29,8 +29,8 @@ struct Channel {
     }
 };
 
-// Without what a machine does not have: the reading of a channel that is faulty, and limits of
-// which nobody set either end.
+// Returns a channel without the values that the product leaves out: the reading of a faulty
+// channel, and pairs of limits that are both 0.
 Channel channelOf(const std::string& label, const json& subfeatures)
 {
     Channel channel{label, {}};
@@ -46,7 +46,7 @@ Channel channelOf(const std::string& label, const json& subfeatures)
     return channel;
 }
 
-// The channels of the kinds that are sensors, by the path of their node.
+// Returns the channels of temperatures, voltages and fans by the path of their node.
 std::map<std::string, Channel> channels()
 {
     const Ended ended = run({"-j"}, {.program = "/usr/bin/sensors"});
@@ -99,7 +99,7 @@ constexpr Value values[] = {{"input", "reading", "CurrentReading"},
     {"crit", "upperCritical", "UpperThresholdCritical"},
     {"emergency", "upperFatal", "UpperThresholdFatal"}};
 
-// Nodes are exact; the properties of instances are cut to whole units of 10^UnitModifier.
+// Nodes are exact; the properties of instances are truncated to whole units of 10^UnitModifier.
 void expectSame(const json& node, const json& properties, const Channel& channel)
 {
     constexpr double printedDigits = 0.0005;

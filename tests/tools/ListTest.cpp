@@ -26,7 +26,7 @@ protected:
         return json::parse(ended.out);
     }
 
-    // The properties of the instance with that name.
+    // Returns the properties of the instance with that name.
     static json propertiesOf(const json& document, const std::string& name)
     {
         for (const json& instance : document.at("instances"))
@@ -154,7 +154,7 @@ TEST_F(ListTest, JsonHoldsEachPropertyWithItsType)
     EXPECT_EQ(properties.at("OperationalStatus"), json({2}));
     EXPECT_EQ(properties.at("SupportedThresholds"), json({0, 1, 2, 3, 4, 5}));
     EXPECT_EQ(properties.at("PossibleStates").at(1), "CriticalHigh");
-    EXPECT_EQ(properties.size(), 27U); // all of the class but LowerThresholdCritical
+    EXPECT_EQ(properties.size(), 27U); // all properties of the class but LowerThresholdCritical
 }
 
 TEST_F(ListTest, JsonLeavesOutWhatTheInstanceLacks)

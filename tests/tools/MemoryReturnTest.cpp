@@ -34,8 +34,8 @@ private:
     std::unique_ptr<char[]> last_;
 };
 
-// Uses 64 MiB in small blocks, on a thread as workers are, and keeps the last of them, behind
-// which nothing can be given back. Throws instead of an answer of no objects.
+// Allocates 64 MiB in small blocks on a thread of its own, and keeps the last block, which prevents
+// the allocator from trimming its heap. Throws where the answer is to have no objects.
 class WastefulHandler : public Host::CimXml::OperationHandler {
 public:
     explicit WastefulHandler(std::size_t objects) : objects_(objects) {}
@@ -60,14 +60,15 @@ private:
     std::unique_ptr<Response> kept_;
 };
 
-// What is resident more once an answer of so many objects was dropped.
+// Returns the growth of the resident memory, in MiB, after an answer with the given number of
+// objects was destroyed.
 std::size_t leftBehindBy(
     std::size_t objects, const std::string& body = Testing::cimCall("EnumerateClassNames"))
 {
     WastefulHandler handler(objects);
     Tools::MemoryReturn memoryReturn(handler);
     const Host::CimXml::Message message(body);
-    ::malloc_trim(0); // what was left behind before would be used again
+    ::malloc_trim(0); // memory that earlier tests freed would be used again
     const std::size_t before = Testing::residentBytes() >> 20U;
     if (objects == 0) {
         EXPECT_THROW(memoryReturn.answer(message, {}), std::runtime_error);
@@ -88,7 +89,7 @@ TEST(MemoryReturnTest, SmallerAnswersKeepItForTheNext)
     EXPECT_GT(leftBehindBy(9'999), 48U);
 }
 
-// A message with so many bytes, most of them around the call.
+// Returns a message of the given size, most of it blanks after the call.
 std::string messageOf(std::size_t size)
 {
     const std::string call = Testing::cimCall("EnumerateClassNames");

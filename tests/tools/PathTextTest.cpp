@@ -23,7 +23,7 @@ protected:
         return Tools::readPath(request_.arena(), *classes_, text);
     }
 
-    // The path read and written again.
+    // Returns the text of the path after it was read.
     std::string again(std::string_view text)
     {
         const Host::ObjectPath* const path = read(text);

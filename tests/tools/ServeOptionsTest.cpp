@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Every limit of the server as an option and as a setting: its name, its default and its bounds.
+// The limits of the server as options and as settings: their names, defaults and bounds.
 
 #include "tools/serve/ServeOptions.h"
 #include "tests/support/ErrorOf.h"
@@ -46,8 +46,8 @@ std::uint64_t countOf(Duration duration)
     return static_cast<std::uint64_t>(duration.count());
 }
 
-// In the order of the limits. A field that is added to a structure does not compile here until it
-// is given its option.
+// Returns the values in the order of the limits. It does not compile when a structure gets a
+// further member.
 Values valuesOf(const Tools::ServeOptions& options)
 {
     const auto& [body, header, depth, connections, connectionsPerAddress, workers, queue, unsent,
@@ -73,7 +73,7 @@ Values with(std::size_t at, std::uint64_t value)
     return values;
 }
 
-// What the options say after such a command line.
+// Returns the values after the command line was parsed.
 Values typed(std::vector<std::string> words)
 {
     CLI::App parser;

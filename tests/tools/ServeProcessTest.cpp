@@ -1,7 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The server and what is around its process: where its output and its log go, who started it and
-// whom it serves as.
+// The process of the server: its output, its log, the service manager and the user that it runs as.
 
 #include "tests/support/Requirement.h"
 #include "tests/tools/ServeTest.h"
@@ -28,7 +27,7 @@ using testing::EndsWith;
 using testing::HasSubstr;
 using testing::StartsWith;
 
-// What systemd is to a service of the type notify.
+// The socket on which systemd receives the notifications of a service.
 class ServiceManager {
 public:
     explicit ServiceManager(std::string path)
@@ -48,7 +47,7 @@ public:
 
     const std::string& path() const { return path_; }
 
-    // The next message; empty when none comes.
+    // Returns the next message; an empty text when none arrives.
     std::string told() const
     {
         std::array<char, 256> text{};
@@ -63,7 +62,7 @@ private:
 
 class ServeProcessTest : public ServeTest {
 protected:
-    // The arguments of a run that serves on any port as who runs the tests.
+    // Returns the arguments of a server on any port that runs as the user of the tests.
     std::vector<std::string> asIs() const
     {
         std::vector<std::string> arguments = withModel({"serve", "--port", "0"});
@@ -72,7 +71,7 @@ protected:
         return arguments;
     }
 
-    // A line of shell that starts the tool.
+    // Writes a shell script with this line. Returns its path.
     std::string script(const std::string& line) const
     {
         const std::string file = folder_.write("script", "#!/bin/bash\n" + line + "\n");
@@ -183,7 +182,7 @@ TEST_F(ServeProcessTest, RootIsRenounced)
     const std::string model = smallModel();
     ::chmod(folder_.path().c_str(), 0711);
     ::chmod(model.c_str(), 0444);
-    // A leak is looked for by a process that must not look any more.
+    // A process that has renounced root may not trace its threads, as the search for leaks does.
     ServerProcess server(
         {"--model", model, "--user", "nobody", "--passwords", secret("passwords", userLine)},
         {{"ASAN_OPTIONS", "detect_leaks=0"}});
@@ -199,12 +198,12 @@ TEST_F(ServeProcessTest, RootIsRenounced)
     EXPECT_EQ(server.end(SIGTERM).code, 0);
 }
 
-// All that it needs is loaded while it can be read.
+// The server loads all files before it renounces root.
 TEST_F(ServeProcessTest, RootIsRenouncedWhereOnlyRootCanReadTheTool)
 {
     if (::geteuid() != 0)
         return cannotRun("only root can renounce root");
-    const std::string tool = install(); // in a folder of root's
+    const std::string tool = install(); // in a folder that only root can read
     std::filesystem::copy(SENSOR_PROFILE_BINARY_DIR "/lib", folder_.path() / "lib");
     const std::string readable = smallModel();
     ::chmod(readable.c_str(), 0444);

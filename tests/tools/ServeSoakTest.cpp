@@ -1,8 +1,8 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Clients of all kinds that keep asking a server of its own process while a chip of the machine
-// comes and goes: every answer is whole and without error, and nothing stays behind in the server.
-// SENSOR_PROFILE_SOAK_SECONDS says for how long.
+// Clients of all kinds send requests to a server process while a chip of the machine appears and
+// disappears: every answer is complete and without error, and the server leaks nothing.
+// SENSOR_PROFILE_SOAK_SECONDS is the duration.
 
 #include "platform/utilities/ProviderUtilities.h"
 #include "tests/support/CimCall.h"
@@ -46,7 +46,7 @@ std::string devicesOfTheSystem()
                 {{"CreationClassName", "ZUMLO_ComputerSystem"}, {"Name", Vorn::getSystemName()}})));
 }
 
-// One of the chip that stays.
+// Returns a request for a sensor of the chip that stays.
 std::string oneSensor()
 {
     const std::string sensor = cimInstanceName(
@@ -65,7 +65,7 @@ bool isWellFormed(const std::string& text)
            XML_STATUS_OK;
 }
 
-// Returns how many sensors the response holds; -1 when it is not whole or holds an error.
+// Returns the number of sensors in the response; -1 when it is incomplete or contains an error.
 int sensorsOf(const HttpReply& reply)
 {
     if (reply.status != 200 || !reply.body.ends_with("</CIM>\n") || !isWellFormed(reply.body) ||
@@ -74,7 +74,7 @@ int sensorsOf(const HttpReply& reply)
     return static_cast<int>(countOf(reply.body, "<INSTANCE CLASSNAME=\"ZUMLO_NumericSensor\">"));
 }
 
-// What the answers had.
+// Counts the answers with and without the sensor of the chip.
 struct Seen {
     std::atomic<int> answers{0};
     std::atomic<int> withChip{0};
@@ -88,10 +88,10 @@ protected:
         MountNamespaceTest::SetUp();
         if (IsSkipped() || HasFailure())
             return;
-        // It lasts long enough to run beside all other tests without being in their way.
+        // The test is the longest one and yields the processors to the others.
         EXPECT_NE(::nice(10), -1);
         sysfs_ = std::make_unique<BoundSysfs>("hotplug");
-        // Else the address sanitizer keeps what was freed, up to 256 MB.
+        // By default, the address sanitizer would keep up to 256 MB of freed memory.
         const std::string file = (folder_.path() / "one").string();
         makeCertificate(file, "localhost");
         server_ = std::make_unique<ServerProcess>(
@@ -101,7 +101,8 @@ protected:
                 {"RYNLOG_LOG", "off"}});
     }
 
-    // A connection asks some times, as one that stays for ever would hide a leak in each.
+    // Sends ten requests on a connection: one connection for all requests would hide a leak in each
+    // connection.
     void askAll(HttpClient&& client, const std::string& request, int least, int most)
     {
         for (int i = 0; i < 10; ++i) {
@@ -115,7 +116,8 @@ protected:
         }
     }
 
-    // Ends a connection in the middle of the answer, another one in the middle of the request.
+    // Closes a connection in the middle of the answer, and another one in the middle of the
+    // request.
     void breakOff()
     {
         HttpClient reading(server_->port());
@@ -171,7 +173,7 @@ protected:
             std::distance(std::filesystem::directory_iterator(folder), {}));
     }
 
-    // The server sees the end of connections a little after the clients.
+    // The server closes its side of connections a little after the clients.
     bool waitForDescriptors(std::size_t count) const
     {
         return waitUntil([&] { return descriptors() == count; }, 10s);

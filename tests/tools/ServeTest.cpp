@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The server as an administrator starts, asks, signals and ends it.
+// The server as an administrator starts, uses, signals and stops it.
 
 #include "tests/tools/ServeTest.h"
 #include "tests/support/TlsClient.h"
@@ -22,7 +22,7 @@ using testing::HasSubstr;
 using testing::MatchesRegex;
 using testing::StartsWith;
 
-// A client whose request the server has seen the head of.
+// Returns a client of whose request the server has read the head.
 HttpClient beginRequest(std::uint16_t port)
 {
     HttpClient client(port);
@@ -238,7 +238,7 @@ TEST_F(ServeTest, ConfigurationFileSaysWhatOptionsSay)
                       .status,
             413);
     }
-    // What is typed counts instead.
+    // The command line has precedence.
     const ServerProcess server({"--config", file, "--address", "127.0.0.3"});
     EXPECT_THAT(server.output(),
         AllOf(HasSubstr("http://127.0.0.3:"), Not(HasSubstr("http://127.0.0.1:"))));
@@ -249,7 +249,7 @@ TEST_F(ServeTest, MistakesInTheConfigurationFileAreNamedWithTheirLine)
     const auto problem = [&](const std::string& line) {
         const Ended ended =
             failing({"--config", folder_.write("serve.conf", "# first\n" + line + "\n")});
-        EXPECT_EQ(ended.code, 2) << line; // the unit does not restart it then
+        EXPECT_EQ(ended.code, 2) << line; // the unit does not restart the service then
         const std::size_t begin = ended.err.find("serve.conf");
         const std::size_t advice = ended.err.find(" (sensorctl serve --help says what");
         return begin == std::string::npos ? ended.err : ended.err.substr(begin, advice - begin);

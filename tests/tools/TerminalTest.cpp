@@ -22,7 +22,7 @@ protected:
         return arguments;
     }
 
-    // Longest line in columns, without the terminal's own carriage returns.
+    // Returns the width of the longest line, without the carriage returns of the terminal.
     static std::size_t widest(const std::string& output)
     {
         std::size_t width = 0;
@@ -69,10 +69,10 @@ TEST_F(TerminalTest, LinesFitItsWidth)
     };
     EXPECT_THAT(shown(80), HasSubstr("…"));
     EXPECT_LE(widest(shown(80)), 80U);
-    EXPECT_GE(widest(shown(80)), 79U); // a wide character may leave a column
+    EXPECT_GE(widest(shown(80)), 79U); // a wide character may leave one column free
     EXPECT_LE(widest(shown(100)), 100U);
     EXPECT_THAT(shown(200), HasSubstr(name));
-    EXPECT_LE(widest(shown(0)), 80U); // a terminal that does not know its width
+    EXPECT_LE(widest(shown(0)), 80U); // a terminal that reports no width
 }
 
 TEST_F(TerminalTest, ColumnsSettingGoesBeforeItsWidth)

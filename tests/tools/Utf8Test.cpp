@@ -71,7 +71,7 @@ TEST(CutToWidthTest, EndsInAnEllipsisAtACharacter)
     EXPECT_EQ(cutToWidth("abcd", 3), "ab…");
     EXPECT_EQ(cutToWidth("Größe!", 4), "Grö…");
     EXPECT_EQ(cutToWidth("温度計", 5), "温度…");
-    EXPECT_EQ(cutToWidth("温度計", 4), "温…"); // a wide character does not fit by half
+    EXPECT_EQ(cutToWidth("温度計", 4), "温…"); // half of a wide character does not fit
     EXPECT_EQ(cutToWidth("abc", 1), "…");
 }
 

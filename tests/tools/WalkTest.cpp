@@ -115,7 +115,7 @@ TEST_F(WalkTest, UnknownObjectIsNotFound)
                          "the path \"nothing\"\n");
 }
 
-// The tool where only the library of the sensors is installed.
+// The tool with only the library of the sensors installed.
 class WalkWithoutCompanionTest : public WalkTest {
 protected:
     WalkWithoutCompanionTest()

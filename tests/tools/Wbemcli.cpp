@@ -34,7 +34,7 @@ std::string plain(const std::string& text)
     for (std::size_t at = result.find(space); at != std::string::npos; at = result.find(space)) {
         const std::size_t before = result.find_last_of("=,", at);
         const std::size_t begin = before == std::string::npos ? 0 : before + 1;
-        // wbemcli leaves the colon out where a key refers to an object of a host.
+        // wbemcli omits the colon where a key refers to an object on a host.
         const std::size_t end = at + space.size();
         result.erase(begin, end - begin + (result.substr(end, 1) == ":" ? 1 : 0));
     }

@@ -1,7 +1,7 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// A client of this system on the server: it must print what `sensorctl --json` shows of the same
-// machine, for each of its operations.
+// The server with the client wbemcli, which prints the same objects as `sensorctl --json` for each
+// of its operations.
 
 #include "tests/tools/Wbemcli.h"
 #include "tests/tools/ServedMachines.h"
@@ -27,13 +27,13 @@ const std::vector<std::string> objectClasses = {
     sensorClass, "ZUMLO_ComputerSystem", "ZUMLO_SensorEnabledLogicalElementCapabilities"};
 const std::vector<std::string> associationClasses = {deviceClass, elementClass};
 
-// What is associated with an object: the other ends and the associations themselves.
+// The objects associated with an object, and the associations themselves.
 struct Associated {
     PlainInstances ends;
     PlainInstances links;
 };
 
-// On the demonstration model and on the chips of a captured machine, as anybody and signed in over
+// Runs on the demonstration model and on a captured machine, without sign-in and with sign-in over
 // TLS.
 class WbemcliTest : public MountNamespaceTest, public testing::WithParamInterface<Place> {
 protected:
@@ -51,7 +51,7 @@ protected:
     static std::string machine() { return std::get<0>(GetParam()); }
     static bool isEncrypted() { return std::get<1>(GetParam()) == "https"; }
 
-    // The way to the server does not depend on which of many objects it is.
+    // Over TLS, every sixth object is enough: the scheme does not depend on the object.
     static std::size_t step() { return isEncrypted() ? 6 : 1; }
 
     std::string url(const std::string& object, const std::string& space = "root/cimv2") const
@@ -80,7 +80,7 @@ protected:
         return instances;
     }
 
-    // The path of an object as a client types it: without where it is.
+    // Returns the path of an object without host and namespace, as a client types it.
     static std::string typed(const json& instance)
     {
         const std::string path = instance.at("path");
@@ -93,7 +93,7 @@ protected:
         return path.insert(path.find(key) + key.size(), "no such ");
     }
 
-    // What the client prints of an object, or of a class.
+    // Returns the output of the client for an object or a class.
     std::string answer(const std::string& operation, const std::string& object,
         const std::vector<std::string>& options = {}, const std::string& properties = "") const
     {
@@ -116,7 +116,7 @@ protected:
         return instances;
     }
 
-    // From the association objects, which name both ends of each.
+    // Returns the objects associated with the path, found in the association objects.
     static Associated associatedWith(
         const std::string& path, const PlainInstances& links, const PlainInstances& objects)
     {
@@ -195,7 +195,8 @@ TEST_P(WbemcliTest, PropertyIsTheInstancesOwn)
                 plain(answer("gp", typed(sensor), {}, name)), name == "Status" ? "" : value + "\n")
                 << name;
         }
-    // Who asks for the Status alone gets none: it comes with the HealthState.
+    // A property list with Status alone selects nothing: the provider sets Status only with
+    // HealthState.
     const PlainInstances both =
         plainInstances(answer("gi", typed(sensor), {}, "HealthState,Status"));
     EXPECT_EQ(both.begin()->second.at("Status"), plainInstance(sensor).second.at("Status"));
@@ -300,7 +301,7 @@ TEST_P(WbemcliTest, WhatIsNotThereIsRefused)
     }
     expectRefused({"gi", url("No_Class.Key=\"1\"")}, "(5) CIM_ERR_INVALID_CLASS");
     expectRefused({"gc", url(sensorClass, "root/none")}, "(3) CIM_ERR_INVALID_NAMESPACE");
-    // Here the class itself is what is asked for.
+    // GetClass has a code of its own for an unknown class (CIM_ERR_NOT_FOUND, DSP0200).
     expectRefused({"gc", url("No_Class")}, "(6) CIM_ERR_NOT_FOUND");
 }
 

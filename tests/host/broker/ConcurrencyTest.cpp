@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Requests on many threads over one broker. Most telling under the thread sanitizer.
+// Requests on many threads with one broker, mainly for the thread sanitizer.
 
 #include "host/broker/Instance.h"
 #include "host/broker/Result.h"

@@ -10,7 +10,7 @@ namespace HostTests {
 
 class EnumerationTest : public BrokerTest {
 protected:
-    // Of paths to these classes.
+    // Returns an enumeration of paths of these classes.
     CMPIEnumeration* enumeration(std::initializer_list<const char*> classes)
     {
         std::vector<Host::Value> paths;

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The broker that fails on demand; the sweeps over the providers show that each call can fail.
+// The broker that injects faults. The sweeps over the providers show that each call can fail.
 
 #include "tests/support/FaultyBroker.h"
 

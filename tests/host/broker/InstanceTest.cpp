@@ -19,7 +19,7 @@ protected:
     {
         return Host::Instance::of(object)->property(name);
     }
-    // Names and values in order, as in "A=1,B=2".
+    // Returns names and values in order, such as "A=1,B=2".
     static std::string propertiesOf(const CMPIInstance* object)
     {
         std::string all;

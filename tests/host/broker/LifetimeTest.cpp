@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Who lives how long: objects of a request, clones, and the memory behind them.
+// The lifetimes of the objects of a request, of clones, and of their memory.
 
 #include "host/broker/CollectedResult.h"
 #include "host/broker/Instance.h"
@@ -97,7 +97,7 @@ TEST_F(LifetimeTest, SixtyThousandInstancesTakeMemoryInProportion)
     const std::size_t few = takenFor(600);
     const std::size_t many = takenFor(60000);
     EXPECT_EQ(memory.taken(), 0U);
-    EXPECT_LT(many, few * 100 * 2); // an arena grows by half: that much may be unused
+    EXPECT_LT(many, few * 100 * 2); // an arena grows by half, which may be unused
     EXPECT_LT(many / 60000, 1536U);
 }
 

@@ -1,7 +1,7 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Every slot of every table is filled, answers that it is not supported where no shipped provider
-// calls it, and survives a handle that is null, empty or of another kind.
+// Every slot of every table is filled, returns CMPI_RC_ERR_NOT_SUPPORTED where no shipped provider
+// calls it, and accepts handles that are null, empty or of another kind.
 
 #include "host/broker/Tables.h"
 
@@ -26,9 +26,9 @@ char letterOf(CMPIrc code)
     return code == CMPI_RC_ERR_INVALID_HANDLE ? 'o' : code == CMPI_RC_ERR_NOT_SUPPORTED ? '-' : '?';
 }
 
-// Calls slots with a first argument and zeros. Its letters say what they answer: 'o' for an
-// offered one that refuses its handle, '-' for one that is not supported, '.' for nothing from one
-// that can return no code, '!' for a null slot, '?' for anything else.
+// Calls a slot with a first argument and zeros, and returns a letter for the result: 'o' for a
+// supported slot that refuses its handle, '-' for one that is not supported, '.' for one that
+// returns nothing and no code, '!' for a null slot, '?' for anything else.
 class Probe {
 public:
     explicit Probe(void* first) : first_(first) {}
@@ -93,7 +93,7 @@ std::string lettersOf(void* first, Slots... slots)
     return {Probe(first)(slots)...};
 }
 
-// The structured bindings name every member of a table: one left out does not compile.
+// The structured bindings name every member of a table: it does not compile when one is missing.
 std::string answersOf(const CMPIStringFT& table, void* first)
 {
     const auto [version, a, b, c] = table;
@@ -221,7 +221,7 @@ TEST_F(TablesTest, WithoutArgumentsNothingIsMade)
     EXPECT_EQ(CMNewObjectPath(mb, nullptr, nullptr, nullptr), nullptr);
     EXPECT_EQ(CMTraceMessage(mb, CMPI_LEV_INFO, nullptr, nullptr, nullptr).rc, CMPI_RC_OK);
     EXPECT_EQ(CBEnumInstanceNames(mb, nullptr, nullptr, &rc), nullptr);
-    EXPECT_EQ(rc.rc, CMPI_RC_ERR_NOT_SUPPORTED); // nobody answers up-calls
+    EXPECT_EQ(rc.rc, CMPI_RC_ERR_NOT_SUPPORTED); // no object answers up-calls
 }
 
 } // namespace HostTests

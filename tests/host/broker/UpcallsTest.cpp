@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Up-calls reach what the host set to answer them.
+// Up-calls reach the object that the host has set.
 
 #include "host/broker/BrokerUpcalls.h"
 
@@ -14,7 +14,7 @@ namespace HostTests {
 
 namespace {
 
-// Answers from a request nested in the caller's, as a manager does, and keeps what it saw.
+// Answers in a request nested in that of the caller, as a manager does, and records its arguments.
 class TwoNames : public Host::BrokerUpcalls {
 public:
     explicit TwoNames(const Host::Broker& broker) : broker_(broker) {}

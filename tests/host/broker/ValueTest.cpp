@@ -18,7 +18,7 @@ using Host::Value;
 
 class ValueTest : public BrokerTest {
 protected:
-    // Through a property, from the provider to the host.
+    // Returns the value that the host reads from a property that a provider has set.
     template <typename T>
     Value through(const T& value, CMPIType type)
     {

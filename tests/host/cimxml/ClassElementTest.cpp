@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Classes and qualifiers as they are written.
+// The XML of classes and qualifiers.
 
 #include "host/cimxml/ClassElement.h"
 #include "host/cimxml/QualifierElement.h"

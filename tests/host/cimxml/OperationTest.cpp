@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The operations that read, and their parameters.
+// The operations of a read-only server, and their parameters.
 
 #include "host/broker/ObjectPath.h"
 #include "tests/host/cimxml/CimXmlTest.h"

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// What is no request, and how that is told.
+// Texts that are no request, and their outcomes.
 
 #include "tests/host/cimxml/CimXmlTest.h"
 

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Object paths: the types of keys, the spellings of clients, and the way back.
+// Object paths: the types of keys, the spellings that clients use, and the XML of paths.
 
 #include "host/broker/ObjectPath.h"
 #include "tests/host/cimxml/CimXmlTest.h"

@@ -50,7 +50,7 @@ protected:
         appendObjects(writer, out);
         return out;
     }
-    // Returns what stands in the IRETURNVALUE.
+    // Returns the content of the IRETURNVALUE.
     template <typename AppendObject>
     std::string result(OperationKind kind, const AppendObject& appendObject)
     {

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Which heads are in order, without sockets.
+// The heads that are accepted and refused, without sockets.
 
 #include "host/http/HeaderCheck.h"
 #include "host/cimxml/Message.h"
@@ -45,7 +45,7 @@ CallHead check(const RequestHead& head)
     return checkHead(head, bodySizeOf(head), limits);
 }
 
-// "ok", or the status with the CIMError.
+// Returns "ok", or the status with the CIMError.
 std::string verdict(const Fields& fields, const std::string& method = "POST",
     const std::string& target = "/cimom", const std::string& version = "HTTP/1.1")
 {

@@ -1,7 +1,7 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// What no well-behaved client does, as far as it does not fit into a file (RequestFilesTest): too
-// large, or a matter of time. Whatever it is, the next client is served.
+// Hostile requests that are too large for a file of RequestFilesTest or depend on time. After each,
+// the next client is served.
 
 #include "tests/host/http/HttpTest.h"
 

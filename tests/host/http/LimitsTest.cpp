@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Clients that are too many, too large or too slow.
+// Too many clients, too large requests and too slow clients.
 
 #include "tests/host/http/HttpTest.h"
 #include "tests/support/LogCapture.h"
@@ -15,7 +15,7 @@ using testing::HasSubstr;
 using testing::StartsWith;
 using namespace std::chrono_literals;
 
-// Holds whoever comes until it is opened.
+// Blocks each thread that passes until the gate is opened.
 class Gate {
 public:
     void pass()
@@ -156,7 +156,7 @@ TEST_F(LimitsTest, ConnectionsOfOneAddressAreBounded)
     }
     EXPECT_TRUE(connect().isClosed());
     EXPECT_TRUE(connect().isClosed());
-    ASSERT_EQ(log.log().size(), 1U); // not for each
+    ASSERT_EQ(log.log().size(), 1U); // not one for each
     EXPECT_EQ(log.log()[0].text, "refused a connection from 127.0.0.1: there are 3, too many of "
                                  "them from this address");
     HttpClient other(port, "127.0.0.1");
@@ -250,11 +250,11 @@ TEST_F(LimitsTest, RequestsBeyondTheQueueAreToldToComeAgain)
         return others.size() <= 1;
     });
     ASSERT_EQ(others.size(), 1U);
-    EXPECT_FALSE(others.front().hasReplyWithin(100ms)); // it waits
+    EXPECT_FALSE(others.front().hasReplyWithin(100ms)); // the request is blocked
     gate.open();
     EXPECT_EQ(running.receive().status, 200);
     EXPECT_EQ(others.front().receive().status, 200);
-    server.reset(); // nobody passes the gate any more
+    server.reset(); // no thread passes the gate after this
 }
 
 TEST_F(LimitsTest, SilentConnectionsEnd)
@@ -276,7 +276,7 @@ TEST_F(LimitsTest, SilentConnectionsEnd)
     EXPECT_EQ(operations.calls, 1);
 }
 
-// Sends a byte now and then on each until it ends; false when that takes longer.
+// Sends a byte on each connection repeatedly until it is closed. Returns false after the timeout.
 bool endWhileTrickling(std::vector<HttpClient> clients, std::chrono::seconds timeout)
 {
     const auto hasEnded = [](HttpClient& client) {

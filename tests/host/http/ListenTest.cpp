@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Where the server may listen, and what comes in its way.
+// The addresses that a server may listen on, and the failures to do so.
 
 #include "tests/host/http/HttpTest.h"
 #include "tests/support/ErrorOf.h"
@@ -92,7 +92,7 @@ TEST(ListenTest, AnyPortIsTheSameForAllAddresses)
     const auto sockets = listenOn({{{"127.0.0.1", 0}}, {{"127.0.0.2", 0}}});
     EXPECT_NE(sockets[0].address().port(), 0);
     EXPECT_EQ(sockets[0].address().port(), sockets[1].address().port());
-    // Which cannot be where it is taken already.
+    // The same address gets another port, since the first is in use.
     const auto others = listenOn({{{"127.0.0.1", 0}}, {{"127.0.0.1", 0}}});
     EXPECT_NE(others[0].address().port(), others[1].address().port());
 }

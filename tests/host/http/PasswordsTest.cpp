@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Password files and the hashes in them.
+// Password files and their hashes.
 
 #include "host/http/Passwords.h"
 #include "tests/host/http/Hashes.h"

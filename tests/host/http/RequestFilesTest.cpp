@@ -1,11 +1,11 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Requests in files, hostile ones for the most part, and their answers.
+// Requests in files, most of them hostile, and their answers.
 //
-// NAME.exchange holds what a client sends, the line `-- Answer:`, all that comes back, without
-// carriage returns and dates, and a line that says how the connection ended. Each line of the
-// request is sent with CR LF behind it, but for one that ends with a backslash, which is sent
-// alone. Within a line, \r, \n, \0 and \xNN stand for a byte.
+// NAME.exchange contains the request, the line `-- Answer:`, all answers without carriage returns
+// and dates, and a line on the end of the connection. A CR LF is sent after each line of the
+// request, except for a line that ends with a backslash. Within a line, \r, \n, \0 and \xNN stand
+// for a byte.
 
 #include "tests/host/http/HttpTest.h"
 #include "tests/support/Texts.h"
@@ -16,7 +16,7 @@ namespace {
 
 const std::filesystem::path Folder = SENSOR_PROFILE_SOURCE_DIR "/tests/data/http";
 
-// Returns the byte that the escape at the beginning stands for, and removes the escape.
+// Removes the escape at the beginning of the text. Returns its byte.
 char takeEscape(std::string_view& text)
 {
     const std::string_view digits = text.substr(std::min<std::size_t>(text.size(), 2), 2);
@@ -36,7 +36,7 @@ char takeEscape(std::string_view& text)
     }
 }
 
-// Returns the bytes that the lines of a request stand for.
+// Returns the bytes of a request from its lines.
 std::string bytesOf(std::string_view lines)
 {
     std::string bytes;
@@ -53,7 +53,8 @@ std::string bytesOf(std::string_view lines)
     return bytes;
 }
 
-// What the HTTP library refuses by itself, it says in words of its own, some of them twice.
+// Returns the answers without carriage returns and dates. The page of a refusal by the HTTP library
+// itself is left out: the library sends some twice.
 std::string described(const std::string& answers)
 {
     const bool isOfLibrary = answers.find("<html>") != std::string::npos;
@@ -78,7 +79,7 @@ const std::string isClosedThen = "-- The connection is closed when the client en
 class RequestFilesTest : public HttpTest, public testing::WithParamInterface<std::string> {
 protected:
     void SetUp() override { start(); }
-    // Whatever came before.
+    // The server still serves requests.
     void TearDown() override { EXPECT_EQ(ask(post()).status, 200); }
 
     std::string outcome(const std::string& request, const std::string& expectedEnd) const

@@ -51,7 +51,7 @@ TEST_F(RequestTest, PipelinedRequestsAreAnsweredInTheirOrder)
     HttpClient client = connect();
     client.send(cimRequest("First") + cimRequest("Second") + cimRequest("Third"));
     EXPECT_EQ(client.receive().body, "<answer/>");
-    EXPECT_EQ(client.receive().body, "First"); // which came before
+    EXPECT_EQ(client.receive().body, "First"); // the answer to the first request
     EXPECT_EQ(client.receive().body, "Second");
     EXPECT_EQ(operations.finished, 3);
     EXPECT_EQ(names, (std::vector<std::string>{"First", "Second", "Third"}));

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Who may go on, over sockets.
+// Sign-ins of clients, over sockets.
 
 #include "tests/host/http/Hashes.h"
 #include "tests/host/http/HttpTest.h"
@@ -41,7 +41,7 @@ protected:
         start();
     }
 
-    // Two clients with a wrong password each.
+    // Sends a wrong password from two clients at once.
     void guessTwiceAtATime()
     {
         HttpClient one = connect();

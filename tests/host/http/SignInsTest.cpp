@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// What is known of those who sign in, without sockets.
+// The delays and the memory of sign-ins, without sockets.
 
 #include "host/http/SignIns.h"
 #include "tests/host/http/Hashes.h"

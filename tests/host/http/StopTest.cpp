@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// How the server ends.
+// The shutdown of the server.
 
 #include "tests/host/http/HttpTest.h"
 
@@ -51,7 +51,7 @@ TEST_F(StopTest, LargeAnswersAreFetchedToTheirEnd)
     EXPECT_FALSE(server->waitUntilIdle(100ms));
     EXPECT_EQ(client.receive().body.size(), 20'000'000U);
     EXPECT_TRUE(server->waitUntilIdle(5s));
-    EXPECT_TRUE(client.isClosed()); // though its head was sent when nobody thought of an end
+    EXPECT_TRUE(client.isClosed()); // although its head announced no close
 }
 
 TEST_F(StopTest, HalfSentRequestsAreNotWaitedForLong)
@@ -61,7 +61,7 @@ TEST_F(StopTest, HalfSentRequestsAreNotWaitedForLong)
     headless.send(post().substr(0, 200));
     HttpClient bodyless = connect();
     bodyless.send(post().substr(0, post().size() - 1));
-    EXPECT_EQ(ask(post()).status, 200); // by now the server has seen the others' beginning
+    EXPECT_EQ(ask(post()).status, 200); // the server has read the beginning of the others
     server->beginShutdown();
     EXPECT_TRUE(server->waitUntilIdle(8s));
     EXPECT_TRUE(headless.isClosed());

@@ -118,7 +118,7 @@ TEST_F(TlsTest, ClientsThatDoNotFinishTheHandshakeEnd)
     HttpClient begun = connect();
     begun.send(std::string_view("\x16\x03\x01\x02\x00\x01\x00", 7));
     for (HttpClient* const client : {&silent, &begun})
-        while (!client->receiveSome().empty()) // it is told why
+        while (!client->receiveSome().empty()) // the server sends an alert
             continue;
     TlsClient client(port);
     client.send(post());
@@ -144,7 +144,7 @@ TEST_F(TlsTest, RefusedClientsMayComeWhileCertificatesAreReplaced)
     server.reset();
     limits.maximumConnections = 1;
     start({{{"127.0.0.1", 0}, true}});
-    certificate.reset(); // a replaced one is freed where no connection keeps it
+    certificate.reset(); // a replaced certificate is freed when no connection uses it
     TlsClient client(port);
     std::jthread replacing([&](const std::stop_token& stop) {
         while (!stop.stop_requested())
@@ -162,7 +162,7 @@ TEST_F(TlsTest, RefusedClientsMayComeWhileCertificatesAreReplaced)
     EXPECT_EQ(client.receive().status, 200);
 }
 
-// Who writes to them would raise a SIGPIPE, which ends a process that does not care for it.
+// Writing to them would raise SIGPIPE, which terminates a process that does not ignore it.
 TEST_F(TlsTest, ClientsThatVanishAmidTheirAnswerDoNoHarm)
 {
     struct sigaction action = {};

@@ -1,7 +1,7 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// An object manager may load the provider for all to see: whatever it exports beside its
-// factories could take the place of somebody else's function.
+// An object manager may load the provider with RTLD_GLOBAL: any symbol that it exports beside its
+// factories could replace a function of another library.
 
 #include "tests/support/ExportedNames.h"
 

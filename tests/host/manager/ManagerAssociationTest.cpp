@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Operations that follow associations.
+// Operations along associations.
 
 #include "tests/host/manager/ManagerTest.h"
 
@@ -30,7 +30,7 @@ protected:
             });
     }
 
-    // What the association providers are asked with.
+    // Returns the calls of the association providers with their arguments.
     const std::vector<std::string>& asked(const char* source, const Association& association)
     {
         arguments_.clear();
@@ -103,9 +103,9 @@ TEST_F(ManagerAssociationTest, ResultClassesThatCannotBeReachedExcludeAnAssociat
 {
     EXPECT_THAT(asked("Box", {.resultClass = "Idle"}), ElementsAre("ThingLink Idle - -"));
     EXPECT_THAT(asked("Box", {.associationClass = "BoxLink", .resultClass = "SpecialPart"}),
-        ElementsAre("BoxLink SpecialPart - -")); // a Part may be one
+        ElementsAre("BoxLink SpecialPart - -")); // a Part may be a SpecialPart
     EXPECT_THAT(asked("Box", {.associationClass = "BoxLink", .resultClass = "Thing"}),
-        ElementsAre("BoxLink - - -")); // all that it leads to is a Thing
+        ElementsAre("BoxLink - - -")); // all objects at its ends are Things
 }
 
 TEST_F(ManagerAssociationTest, TheSourceKeepsItsKeysAndHasItsClassesRegisteredName)
@@ -158,7 +158,7 @@ TEST_F(ManagerAssociationTest, ReferencesGoByTheAssociationClassAsResultClass)
     const auto found = manager_.references(
         context(), path("Box"), {.resultClass = "Link", .role = "Whole"}, nullptr);
     EXPECT_THAT(arguments_, ElementsAre("BoxLink Whole", "ThingLink Whole"));
-    EXPECT_THAT(delivered(found), ElementsAre("BoxLink")); // what is no Link is left out
+    EXPECT_THAT(delivered(found), ElementsAre("BoxLink")); // objects that are no Link are left out
     arguments_.clear();
     manager_.referenceNames(context(), path("Part"), {.resultClass = "BoxLink"});
     EXPECT_THAT(arguments_, ElementsAre("BoxLink -"));

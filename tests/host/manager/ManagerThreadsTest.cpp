@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Many requests at once.
+// Requests on many threads.
 
 #include "tests/host/manager/ManagerTest.h"
 
@@ -23,7 +23,7 @@ void onThreads(const std::function<void()>& work)
         thread.join();
 }
 
-// Its own fixture: the others' note their calls, which is for one thread.
+// A fixture of its own, since the providers of the others record their calls on one thread.
 class ManagerThreadsTest : public Testing::ManagerTest {
 protected:
     ManagerThreadsTest()

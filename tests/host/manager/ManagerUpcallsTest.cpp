@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Providers that ask the manager for objects of other providers.
+// Up-calls of providers for the objects of other providers.
 
 #include "tests/host/manager/ManagerTest.h"
 
@@ -15,13 +15,13 @@ constexpr CMPIStatus Ok = {CMPI_RC_OK, nullptr};
 
 class ManagerUpcallsTest : public Testing::ManagerTest {
 protected:
-    // What a provider gets for its path.
+    // Returns the path that a provider gets.
     CMPIObjectPath* target(const char* className) const
     {
         return CMNewObjectPath(broker(), Testing::NameSpace, className, nullptr);
     }
 
-    // Hands over all that an up-call found.
+    // Delivers all objects that an up-call returned.
     static CMPIStatus handOver(
         const ProviderCall& call, const CMPIEnumeration* found, const CMPIStatus& status)
     {

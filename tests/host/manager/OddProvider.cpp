@@ -38,7 +38,7 @@ extern "C" {
     return &report;
 }
 
-// Calls up while it is made and reports what it is told.
+// Makes an up-call in its factory and reports the returned code.
 [[gnu::visibility("default")]] CMPIInstanceMI* Calling_Create_InstanceMI(
     const CMPIBroker* broker, const CMPIContext* context, CMPIStatus*)
 {

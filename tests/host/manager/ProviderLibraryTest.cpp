@@ -30,7 +30,7 @@ using testing::HasSubstr;
 const std::string oddProvider = SENSOR_PROFILE_BINARY_DIR "/lib/libOddProvider.so";
 const std::string sensorProvider = SENSOR_PROFILE_BINARY_DIR "/lib/libSensorProfileProvider.so";
 
-// Keeps the odd library in memory and asks it what happened.
+// Keeps the odd library loaded and reads its report.
 class Witness {
 public:
     Witness() : library_(::dlopen(oddProvider.c_str(), RTLD_NOW | RTLD_LOCAL))
@@ -94,7 +94,7 @@ TEST_F(ProviderLibraryTest, LetsEveryManagementInterfaceCleanUpWithAContext)
 
 TEST_F(ProviderLibraryTest, StaysInMemoryWhenACleanupAsksForIt)
 {
-    // Under a name of its own, lest other tests find it in memory.
+    // The copy has a name of its own, which no other test has loaded.
     const Testing::TemporaryFolder folder;
     const std::string copy = (folder.path() / "libStaying.so").string();
     std::filesystem::copy_file(oddProvider, copy);
@@ -143,7 +143,7 @@ TEST_F(ProviderLibraryTest, SaysWhyAFactoryRefuses)
         oddProvider + ": Ancient_Create_InstanceMI answers with a function table of version 86");
 }
 
-// ---- As the manager uses it ----
+// ---- Use by the manager ----
 
 class ManagerLoadingTest : public testing::Test {
 protected:

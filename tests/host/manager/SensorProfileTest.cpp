@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The real libraries under the manager.
+// The manager with the real provider libraries.
 
 #include "host/manager/SensorProfile.h"
 

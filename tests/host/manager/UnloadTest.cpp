@@ -1,7 +1,7 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Object managers unload providers that are idle and load them again at the next request, for
-// years: nothing may stay behind.
+// Object managers unload idle providers and load them again at the next request, for years: no
+// memory, descriptor or mapping may be left.
 
 #include "host/broker/Broker.h"
 #include "host/broker/CollectedResult.h"
@@ -40,7 +40,7 @@ constexpr const char* model = R"({ "nodes": [
     { "type": "tachometer", "path": "/board/fan1", "description": "Fan", "status": 1,
       "baseUnits": 19, "reading": 1200 } ] })";
 
-// One use of the provider from its loading to its unloading.
+// Loads the provider, enumerates the sensors and unloads it.
 void enumerate(std::size_t& count)
 {
     Host::Broker broker;
@@ -64,12 +64,12 @@ std::size_t lines(const char* file)
 
 class UnloadTest : public testing::Test {
 protected:
-    // Uses the provider over and over on the machine that the setting names.
+    // Loads and unloads the provider many times on the machine that VORN_INSTRUMENTATION names.
     void useManyTimes(const std::string& instrumentation, std::size_t sensors)
     {
         constexpr int uses = isSanitized ? 100 : 1000;
         constexpr int warmUp = uses / 10;
-        constexpr std::size_t tolerance = std::size_t{1} << 20; // a kilobyte a use would be more
+        constexpr std::size_t tolerance = std::size_t{1} << 20; // less than a kilobyte per use
         const Testing::EnvironmentVariable machine("VORN_INSTRUMENTATION", instrumentation);
         const Testing::EnvironmentVariable level("RYNLOG_LEVEL", "3000");
         const Testing::EnvironmentVariable log("RYNLOG_LOG", "file:" + path("log"));
@@ -85,7 +85,7 @@ protected:
         EXPECT_EQ(Testing::openDescriptors(), descriptorsBefore);
         EXPECT_GT(std::filesystem::file_size(path("trace")), 0U);
         if (isSanitized)
-            return; // a sanitizer's own bookkeeping grows
+            return; // the sanitizer's own memory grows
         EXPECT_LE(Testing::residentBytes(), sizeBefore + tolerance);
         EXPECT_LE(lines("/proc/self/maps"), mappingsBefore + 2);
     }
@@ -120,7 +120,7 @@ TEST_F(UnloadTest, ThousandUsesOnAModelLeaveNothingBehind)
     useManyTimes("model:" + folder_.write("model.json", model), 3);
 }
 
-// Together with the machine's own sensors, of which there may be none.
+// This machine may have sensors or none.
 TEST_F(UnloadTest, ThousandUsesOnThisMachineLeaveNothingBehind)
 {
     std::size_t sensors = 0;

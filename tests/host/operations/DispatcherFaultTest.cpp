@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// How operations fail.
+// The failures of operations.
 
 #include "host/cimxml/RequestError.h"
 #include "host/operations/ObjectManager.h"
@@ -24,7 +24,7 @@ protected:
     {
         return errorIn(ask(operation, parameters));
     }
-    // The provider ends with this after what it may have delivered.
+    // Returns the error of an operation whose provider returns this status.
     std::string errorOfProvider(CMPIrc code, const char* message)
     {
         manager_.script("Things",
@@ -113,7 +113,7 @@ TEST_F(DispatcherFaultTest, AnElementThatLacksSomethingIsNoAnswer)
 {
     EXPECT_THROW(ask("GetInstance", parameter("InstanceName", "<INSTANCENAME/>")),
         Host::CimXml::RequestError);
-    // Nothing of that request is left on the thread.
+    // The failed request has left no state on the thread.
     EXPECT_EQ(errorOf("EnumerateInstances", ofThing_), "");
 }
 

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// What providers are called with for an operation, and the responses made of their results.
+// The arguments of provider calls for an operation, and the responses from their results.
 
 #include "host/broker/Instance.h"
 #include "host/broker/ObjectPath.h"
@@ -35,7 +35,7 @@ std::string list(const std::vector<std::string>& names)
 
 class DispatcherTest : public testing::Test {
 protected:
-    // Lets the test look at what the provider is called with.
+    // Passes the calls of the provider to a function of the test.
     void onThings(const std::function<void(const ProviderCall&)>& look)
     {
         manager_.script("Things", [this, look](const ProviderCall& asked) {

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The provider of root/interop, as the manager and other providers see it.
+// The provider of root/interop, called by the manager and by up-calls.
 
 #include "host/operations/InteropProvider.h"
 
@@ -23,7 +23,7 @@ using testing::UnorderedElementsAre;
 
 class InteropProviderTest : public testing::Test {
 protected:
-    // The names of the properties of the one profile.
+    // Returns the names of the properties of the only profile.
     std::vector<std::string> profile(const char** properties)
     {
         const auto answer = manager_.enumerateInstances(request_.context(),

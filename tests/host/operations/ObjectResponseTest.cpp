@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Answers as they are read, piece by piece, after their request has ended.
+// Responses that are read piece by piece after their request has ended.
 
 #include "host/operations/ObjectResponse.h"
 #include "host/broker/Broker.h"

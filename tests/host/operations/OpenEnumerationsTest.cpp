@@ -33,7 +33,7 @@ std::string refusalOf(const std::function<void()>& operation)
 
 class OpenEnumerationsTest : public testing::Test {
 protected:
-    // Class names stand for objects of all kinds.
+    // Returns class names, which stand for objects of any kind.
     static FoundObjects objects(std::size_t count)
     {
         static const std::string digits = "0123456789";
@@ -48,7 +48,7 @@ protected:
         return enumerations_.open({Owner, objects(count), {}, timeout});
     }
 
-    // What was pulled, with a full stop when it was the last.
+    // Returns the pulled objects, followed by a full stop at the end of the enumeration.
     std::string pull(const std::string& context, std::size_t count, EnumerationOwner owner = Owner)
     {
         std::string text;
@@ -130,7 +130,7 @@ TEST_F(OpenEnumerationsTest, TheyHoldNoMoreThanTheLimit)
     EXPECT_EQ(
         refusalOf([&] { open(41); }), "27: open enumerations would hold more than 100 objects");
     open(40, 10s);
-    pull(first, 59); // one is left, and the memory of all
+    pull(first, 59); // one object is left, and the memory of all
     EXPECT_THAT(refusalOf([&] { open(1); }), testing::StartsWith("27: "));
     pull(first, 1);
     open(60);
@@ -187,7 +187,7 @@ TEST(OpenEnumerationsThreadsTest, EachObjectIsPulledOnce)
                     const auto next = enumerations.pull(context, Owner, 3);
                     pulled += next.objects.size();
                     ends += next.isOver ? 1 : 0;
-                    // Others come and go.
+                    // Other enumerations are opened and closed.
                     enumerations.close(enumerations.open({Owner, next.objects, {}, 60s}), Owner);
                 }
             } catch (const Host::Refusal& refusal) {

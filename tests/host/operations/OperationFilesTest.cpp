@@ -1,11 +1,11 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Requests in files with the responses that are expected, for each operation and its options.
+// Requests in files with the expected responses, for each operation and its options.
 //
-// NAME.xml holds a request, the line `<!-- response -->` and the response with the elements on
-// lines of their own. In both @SYSTEM@ stands for the kernel's host name, @VERSION@ for that of the
-// product and @CONTEXT@ for the context of the open enumeration. `<!-- after OTHER.xml -->` in a
-// request: the request of the other file is sent before it.
+// NAME.xml contains a request, the line `<!-- response -->` and the response with each element on a
+// line of its own. In both, @SYSTEM@ stands for the kernel's host name, @VERSION@ for the version of
+// the product, and @CONTEXT@ for the context of the open enumeration. Before a request with
+// `<!-- after OTHER.xml -->`, the request of that file is sent.
 
 #include "host/cimxml/OperationTable.h"
 #include "platform/utilities/ProviderUtilities.h"
@@ -23,7 +23,7 @@ namespace {
 
 const std::filesystem::path Folder = SENSOR_PROFILE_SOURCE_DIR "/tests/data/cimxml/operations";
 
-// Without line breaks and the indentation after them.
+// Returns the text without line breaks and the indentation after them.
 std::string unfolded(const std::string& text)
 {
     std::string line;

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Many clients at once, with the real providers.
+// Requests on many threads, with the real providers.
 
 #include "tests/host/operations/ShippedManager.h"
 
@@ -23,7 +23,7 @@ protected:
         return answerTo(*manager_, callIn("root/cimv2", operation, parameters));
     }
 
-    // Pulls one after the other; how many objects there were.
+    // Pulls all objects one by one. Returns their number.
     std::size_t pullAll()
     {
         const std::string one = valueOf("MaxObjectCount", "1");

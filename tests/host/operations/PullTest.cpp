@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Enumerations that are opened, pulled and closed by messages.
+// Messages that open, pull and close enumerations.
 
 #include "tests/host/operations/ScriptedManager.h"
 #include "tests/support/CountingMemory.h"
@@ -87,7 +87,7 @@ TEST_F(PullTest, OnlyWhoOpenedItMayPull)
     const std::string context = contextIn(open(0, {}, {"anna", "a"}));
     EXPECT_THAT(errorIn(pull(context, 1, {"bert", "a"})), StartsWith("21"));
     EXPECT_THAT(errorIn(pull(context, 1)), StartsWith("21"));
-    // From wherever.
+    // The client's address does not matter.
     EXPECT_EQ(errorIn(pull(context, 1, {"anna", "b"})), "");
 }
 
@@ -146,7 +146,7 @@ TEST_F(PullTest, TooManyAreRefused)
     EXPECT_THAT(errorIn(ask("CloseEnumeration", toClose)), StartsWith("21"));
     EXPECT_EQ(errorIn(open(1)), "");
     EXPECT_THAT(errorIn(open(1)), StartsWith("27"));
-    manager_.wait(60s); // their time is over
+    manager_.wait(60s); // they time out
     EXPECT_EQ(errorIn(open(1)), "");
 }
 

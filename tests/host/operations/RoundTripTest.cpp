@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Every path that an operation answers finds its object.
+// GetInstance returns an object for every path in a response.
 
 #include "tests/host/operations/ShippedManager.h"
 
@@ -14,7 +14,7 @@ namespace {
 constexpr std::string_view Begin = "<INSTANCENAME ";
 constexpr std::string_view End = "</INSTANCENAME>";
 
-// The names in the text, without those in one another.
+// Returns the instance names in the text, without those nested in others.
 std::vector<std::string> namesIn(const std::string& text)
 {
     std::vector<std::string> names;
@@ -34,7 +34,7 @@ std::vector<std::string> namesIn(const std::string& text)
     return names;
 }
 
-// The text without the properties of instances, which may hold paths too.
+// Returns the text without instances, whose properties may contain paths.
 std::string withoutInstances(std::string text)
 {
     constexpr std::string_view last = "</INSTANCE>";
@@ -52,8 +52,8 @@ protected:
         return answer;
     }
 
-    // The paths of the objects that the operation answers. Each is tried out, and so are those in
-    // properties.
+    // Returns the paths of the objects in the response. Expects GetInstance to find each of them,
+    // and those in properties.
     std::vector<std::string> found(const std::string& operation, const std::string& parameters)
     {
         const std::string answer = ask(operation, parameters);
@@ -87,7 +87,7 @@ protected:
 
     ShippedManager manager_;
     std::string nameSpace_ = "root/cimv2";
-    std::set<std::string> tried_; // classes
+    std::set<std::string> tried_; // the classes of these paths
 };
 
 TEST_F(RoundTripTest, PathsOfEnumerations)

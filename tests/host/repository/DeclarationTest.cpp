@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// What a MOF file may declare.
+// The declarations of MOF files.
 
 #include "tests/host/repository/MofTest.h"
 
@@ -110,7 +110,7 @@ TEST(DeclarationTest, QualifiersCarryValuesAndLists)
     EXPECT_EQ(Host::findQualifier(qualifiers, "VALUES")->value,
         Host::Constant(std::vector<Host::Scalar>{std::string("a"), std::string("b")}));
     EXPECT_EQ(Host::findQualifier(qualifiers, "MaxLen")->value, constant(std::uint64_t{16}));
-    // Without a value only a boolean qualifier says something.
+    // Without a value, only a boolean qualifier has an effect.
     EXPECT_TRUE(Host::isQualified(qualifiers, "Key"));
     EXPECT_TRUE(Host::isNull(Host::findQualifier(qualifiers, "Description")->value));
 }

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// What subclasses inherit, and how they change it.
+// The inheritance and overriding of properties and qualifiers.
 
 #include "tests/host/repository/MofTest.h"
 

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// What is wrong with a MOF file is reported where it stands.
+// Errors in MOF files and their positions.
 
 #include "tests/host/repository/MofTest.h"
 

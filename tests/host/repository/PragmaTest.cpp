@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Files that include others, and namespaces.
+// The pragmas: included files and namespaces.
 
 #include "tests/host/repository/MofTest.h"
 #include "tests/support/TemporaryFolder.h"

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// What the providers of this product publish, held against the classes it ships.
+// The properties that the providers publish, compared with the shipped classes.
 
 #include "host/broker/CollectedResult.h"
 #include "host/broker/Instance.h"

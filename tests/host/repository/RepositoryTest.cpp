@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// What a compiled repository answers.
+// The look-ups in a compiled repository.
 
 #include "tests/host/repository/MofTest.h"
 

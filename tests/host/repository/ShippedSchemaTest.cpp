@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The classes this product ships.
+// The shipped classes.
 
 #include "host/repository/Compiler.h"
 #include "tests/support/TemporaryFolder.h"
@@ -111,7 +111,7 @@ TEST_F(ShippedSchemaTest, InteropDescribesTheObjectManager)
             "CIM_LogicalElement", "CIM_ManagedSystemElement", "CIM_ManagedElement"));
 }
 
-// As other object managers get it: on top of what they have, one file after the other.
+// Other object managers compile one file after the other on top of the classes that they have.
 TEST_F(ShippedSchemaTest, TheFilesCompileOneByOneToo)
 {
     Host::Compiler compiler;
@@ -123,7 +123,7 @@ TEST_F(ShippedSchemaTest, TheFilesCompileOneByOneToo)
     EXPECT_NE(repository->findClass(Cimv2, "ZUMLO_SensorSystemDevice"), nullptr);
 }
 
-// As the operations page tells to make one file of those that an object manager may lack.
+// docs/operations.md has administrators concatenate the classes that an object manager may lack.
 TEST_F(ShippedSchemaTest, TheAncestorsCompileAsOneFile)
 {
     std::string all;
