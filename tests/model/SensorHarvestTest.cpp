@@ -4,13 +4,10 @@
 
 #include "diagnostics/ProviderException.h"
 #include "platform/instrumentation/Instrumentation.h"
-#include "tests/support/LogCapture.h"
 #include "tests/support/ScriptedMachine.h"
 
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
-
-#include <sstream>
 
 #include <unistd.h>
 
@@ -18,8 +15,6 @@ namespace {
 
 using namespace Vorn::SensorProfileProvider;
 using ::testing::ElementsAre;
-using Testing::LogCapture;
-using Testing::LogLine;
 using Testing::ScriptedMachine;
 using Testing::ScriptedNode;
 using Vorn::Instrumentation;
@@ -56,13 +51,6 @@ Harvest harvest()
     result.nothing = getSensorInstances(result.sensors);
     result.standardError = ::testing::internal::GetCapturedStderr();
     return result;
-}
-
-std::string address(const void* pointer)
-{
-    std::ostringstream out;
-    out << pointer;
-    return out.str();
 }
 
 TEST(HarvestTest, OfAMachineWithoutSensorsReportsThatNothingWasFound)
@@ -354,58 +342,6 @@ TEST(CapabilitiesHarvestTest, AppendsOneRecord)
     EXPECT_EQ(capabilities.size(), 1U);
     EXPECT_FALSE(getSensorEnabledLogCapInstances(capabilities));
     EXPECT_EQ(capabilities.size(), 2U);
-}
-
-// ---- Trace lines ----
-
-LogLine mark(const std::string& kind, const std::string& function, unsigned line,
-    const std::string& parameters)
-{
-    return {"log", 3000, "Nimbrel.Sensor", function, "Sensor", line,
-        kind + ": " + function + "() in Sensor [Line: " + std::to_string(line) +
-            "],Parameters List: " + parameters};
-}
-
-TEST(HarvestTraceTest, AHarvestIsMarkedAndSoIsEveryWalkInIt)
-{
-    const ScriptedMachine machine({node(Temperature, "t1"), node(Tachometer, "f1")});
-    const LogCapture capture;
-    std::vector<Sensor> sensors;
-    getSensorInstances(sensors);
-    const auto lines = capture.log();
-    ASSERT_EQ(lines.size(), 6U);
-    const std::string vector = " vectSensor=" + address(&sensors);
-    EXPECT_EQ(lines[0], mark("ENTERING", "getSensorInstances", 668, vector));
-    const auto cursor = lines[1].text.substr(lines[1].text.find(" instrumentation="));
-    EXPECT_THAT(cursor, ::testing::MatchesRegex(" instrumentation=0x[0-9a-f]+"));
-    EXPECT_EQ(lines[1], mark("ENTERING", "setVector", 740, vector + cursor));
-    EXPECT_EQ(lines[2], mark("EXITING", "setVector", 920, vector + cursor));
-    EXPECT_EQ(lines[3].function, "setVector");
-    EXPECT_EQ(lines[4].line, 920U);
-    EXPECT_EQ(lines[5], mark("EXITING", "getSensorInstances", 732, vector));
-}
-
-TEST(HarvestTraceTest, ARefusalLeavesTheWalkWithoutItsExitMark)
-{
-    const ScriptedMachine machine({{Temperature, "/a", "", NodeReading{}}});
-    const LogCapture capture;
-    const Harvest result = harvest();
-    std::vector<unsigned> marked;
-    for (const LogLine& line : capture.log())
-        if (line.component == "Nimbrel.Sensor")
-            marked.push_back(line.line);
-    EXPECT_THAT(marked, ElementsAre(668, 740, 732));
-}
-
-TEST(HarvestTraceTest, TheCapabilitiesHarvestIsMarked)
-{
-    const LogCapture capture;
-    std::vector<SensorEnabledLogCap> capabilities;
-    getSensorEnabledLogCapInstances(capabilities);
-    const std::string vector = " vectSensorEnabledLogCap=" + address(&capabilities);
-    EXPECT_THAT(
-        capture.log(), ElementsAre(mark("ENTERING", "getSensorEnabledLogCapInstances", 639, vector),
-                           mark("EXITING", "getSensorEnabledLogCapInstances", 660, vector)));
 }
 
 } // namespace
