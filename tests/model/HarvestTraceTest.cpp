@@ -23,9 +23,7 @@ using Vorn::NodeLexicon::NodeType;
 
 std::string address(const void* pointer)
 {
-    std::ostringstream out;
-    out << pointer;
-    return out.str();
+    return (std::ostringstream() << pointer).str();
 }
 
 LogLine mark(const std::string& kind, const std::string& function, unsigned line,

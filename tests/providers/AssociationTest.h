@@ -15,9 +15,6 @@
 
 namespace Testing {
 
-constexpr const char* SensorClass = "ZUMLO_NumericSensor";
-constexpr const char* SystemClass = "ZUMLO_ComputerSystem";
-constexpr const char* CapabilitiesClass = "ZUMLO_SensorEnabledLogicalElementCapabilities";
 constexpr const char* CapabilitiesID = "ZUMLO:SensorEnabledLogicalElementCap1";
 
 // The optional parameters of a request for associated objects.

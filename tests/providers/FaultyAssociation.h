@@ -11,6 +11,7 @@
 #include "tests/providers/RequestTrace.h"
 
 #include <algorithm>
+#include <array>
 #include <string>
 #include <vector>
 
@@ -44,15 +45,17 @@ inline SourceMaker pairMaker(const std::string& className, const std::string& on
 inline SourceMaker sensorMaker(const std::string& deviceID)
 {
     return [=](const Host::Request& request) -> Host::ObjectPath& {
-        Host::ObjectPath& made = request.makePath("root/cimv2", "ZUMLO_NumericSensor");
+        Host::ObjectPath& made = request.makePath("root/cimv2", SensorClass);
         for (const auto& [key, text] : std::vector<std::pair<std::string, std::string>>{
-                 {"CreationClassName", "ZUMLO_NumericSensor"}, {"DeviceID", deviceID},
-                 {"SystemCreationClassName", "ZUMLO_ComputerSystem"},
-                 {"SystemName", Vorn::getSystemName()}})
+                 {"CreationClassName", SensorClass}, {"DeviceID", deviceID},
+                 {"SystemCreationClassName", SystemClass}, {"SystemName", Vorn::getSystemName()}})
             made.addKey(key, Host::Value::text(request.arena(), text));
         return made;
     };
 }
+
+enum Which { Associators, AssociatorNames, References, ReferenceNames };
+using AssociationRequests = std::array<RequestKind, 4>;
 
 // Makes the kinds of requests to the provider with these factories.
 struct RequestKinds {
@@ -77,34 +80,28 @@ struct RequestKinds {
             [](auto* mi, auto... all) { return mi->ft->getInstance(mi, all..., nullptr); });
     }
 
-    RequestKind associators(const std::string& name, const SourceMaker& source) const
+    // Returns the requests along the association in the order of Which.
+    AssociationRequests along(const std::string& name, const SourceMaker& source) const
     {
-        return kind("associatorsOf" + name, source, associationFactory, [](auto* mi, auto... all) {
-            return mi->ft->associators(mi, all..., nullptr, nullptr, nullptr, nullptr, nullptr);
-        });
-    }
-
-    RequestKind associatorNames(const std::string& name, const SourceMaker& source) const
-    {
-        return kind(
-            "associatorNamesOf" + name, source, associationFactory, [](auto* mi, auto... all) {
-                return mi->ft->associatorNames(mi, all..., nullptr, nullptr, nullptr, nullptr);
-            });
-    }
-
-    RequestKind references(const std::string& name, const SourceMaker& source) const
-    {
-        return kind("referencesOf" + name, source, associationFactory, [](auto* mi, auto... all) {
-            return mi->ft->references(mi, all..., nullptr, nullptr, nullptr);
-        });
-    }
-
-    RequestKind referenceNames(const std::string& name, const SourceMaker& source) const
-    {
-        return kind(
-            "referenceNamesOf" + name, source, associationFactory, [](auto* mi, auto... all) {
+        const auto of = [&](const std::string& operation, const auto& call) {
+            return kind(operation + "Of" + name, source, associationFactory, call);
+        };
+        return {of("associators",
+                    [](auto* mi, auto... all) {
+                        return mi->ft->associators(
+                            mi, all..., nullptr, nullptr, nullptr, nullptr, nullptr);
+                    }),
+            of("associatorNames",
+                [](auto* mi, auto... all) {
+                    return mi->ft->associatorNames(mi, all..., nullptr, nullptr, nullptr, nullptr);
+                }),
+            of("references",
+                [](auto* mi, auto... all) {
+                    return mi->ft->references(mi, all..., nullptr, nullptr, nullptr);
+                }),
+            of("referenceNames", [](auto* mi, auto... all) {
                 return mi->ft->referenceNames(mi, all..., nullptr, nullptr);
-            });
+            })};
     }
 
 private:

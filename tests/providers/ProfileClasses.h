@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The keys of the profile's classes, which an object manager has in its repository.
+// The profile's classes, and their keys, which an object manager has in its repository.
 
 #pragma once
 
@@ -8,14 +8,18 @@
 
 namespace Testing {
 
+inline constexpr const char* SensorClass = "ZUMLO_NumericSensor";
+inline constexpr const char* SystemClass = "ZUMLO_ComputerSystem";
+inline constexpr const char* CapabilitiesClass = "ZUMLO_SensorEnabledLogicalElementCapabilities";
+
 inline const ClassTable& profileClasses()
 {
     static const ClassTable classes = [] {
         ClassTable table;
-        table.add("ZUMLO_NumericSensor",
+        table.add(SensorClass,
             {"CreationClassName", "DeviceID", "SystemCreationClassName", "SystemName"});
-        table.add("ZUMLO_SensorEnabledLogicalElementCapabilities", {"InstanceID"});
-        table.add("ZUMLO_ComputerSystem", {"CreationClassName", "Name"});
+        table.add(CapabilitiesClass, {"InstanceID"});
+        table.add(SystemClass, {"CreationClassName", "Name"});
         table.add("ZUMLO_SensorElementCapabilities", {"ManagedElement", "Capabilities"});
         table.add("ZUMLO_SensorSystemDevice", {"GroupComponent", "PartComponent"});
         return table;

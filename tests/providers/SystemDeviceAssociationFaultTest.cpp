@@ -30,8 +30,8 @@ TEST_P(SystemDeviceFaultSweepTest, IsSurvivedAndAnswersWithNothingMadeUp)
     sweepFaults(broker_, [&](FaultyBroker& faulty) {
         const FaultyRequest request(broker_, faulty, GetParam());
         EXPECT_LE(request.answer.paths().size() + request.answer.instances().size(), 4U);
-        expectWellFormed(request, Class,
-            {{"GroupComponent", GroupClass}, {"PartComponent", "ZUMLO_NumericSensor"}});
+        expectWellFormed(
+            request, Class, {{"GroupComponent", SystemClass}, {"PartComponent", SensorClass}});
     });
 }
 
@@ -43,7 +43,7 @@ class SystemDeviceAssociationFaultTest : public SystemDeviceFaultTest {};
 TEST_F(SystemDeviceAssociationFaultTest, ATargetThatCannotBeMadeIsNoTarget)
 {
     for (const FaultManner manner : Undelivered)
-        for (const auto* const kinds : {FromSensor, FromSystem})
+        for (const auto& kinds : {FromSensor, FromSystem})
             for (const Which which : {Associators, AssociatorNames, References, ReferenceNames}) {
                 const auto request = run(kinds[which], {BrokerCall::newObjectPath, 1, manner});
                 EXPECT_EQ(countOf(*request), 0U);
@@ -101,7 +101,7 @@ TEST_F(SystemDeviceAssociationFaultTest, SensorPathsThatCannotBeMadeEndInTheFact
 
 TEST_F(SystemDeviceAssociationFaultTest, WithoutAnAssociationPathThereAreNoReferences)
 {
-    for (const auto* const kinds : {FromSensor, FromSystem})
+    for (const auto& kinds : {FromSensor, FromSystem})
         for (const Which which : {References, ReferenceNames}) {
             const Fault fault = {BrokerCall::newObjectPath, 2, FaultManner::nullResult};
             const auto [request, lines] = runTraced(kinds[which], fault);
@@ -139,25 +139,25 @@ TEST_F(SystemDeviceAssociationFaultTest, APathWhoseKeyCountReportsAFailureLeaves
 TEST_F(SystemDeviceAssociationFaultTest, NamespacesLeaveTheStatus)
 {
     expectNamespacesLeaveTheStatus(Names);
-    for (const auto* const kinds : {FromSensor, FromSystem})
+    for (const auto& kinds : {FromSensor, FromSystem})
         for (const Which which : {Associators, AssociatorNames, References, ReferenceNames})
             expectNamespacesLeaveTheStatus(kinds[which]);
 }
 
 TEST_F(SystemDeviceAssociationFaultTest, TheSensorIsGivenItsNamespaceBeforeTheSystem)
 {
-    expectNameSpacesInOrder(Names, Class, "ZUMLO_NumericSensor", GroupClass);
+    expectNameSpacesInOrder(Names, Class, SensorClass, SystemClass);
 }
 
 TEST_F(SystemDeviceAssociationFaultTest, EveryValueIsWhole)
 {
-    expectWholeValues(Names, Instances, {"GroupComponent", GroupClass});
+    expectWholeValues(Names, Instances, {"GroupComponent", SystemClass});
 }
 
 TEST_F(SystemDeviceAssociationFaultTest, EveryAssociatorNameIsGivenItsNamespaceOnceMore)
 {
     run(FromSystem[AssociatorNames], std::vector<Fault>{});
-    EXPECT_EQ(timesCalled("setNameSpace", "ZUMLO_NumericSensor"), 1 + 2 * 2); // and the target's
+    EXPECT_EQ(timesCalled("setNameSpace", SensorClass), 1 + 2 * 2); // and the target's
 }
 
 TEST_F(SystemDeviceAssociationFaultTest, AnAbsentEnumerationHasNoFarEnds)
@@ -210,7 +210,7 @@ TEST_F(SystemDeviceAssociationFaultTest, AnElementWithoutHandleIsLeftOut)
 TEST_F(SystemDeviceAssociationFaultTest, AReferenceThatCannotBeMadeIsLeftOut)
 {
     for (const FaultManner manner : Undelivered)
-        for (const auto* const kinds : {FromSensor, FromSystem})
+        for (const auto& kinds : {FromSensor, FromSystem})
             for (const Which which : {References, ReferenceNames}) {
                 const auto request = run(kinds[which], {BrokerCall::newInstance, 1, manner});
                 EXPECT_EQ(request->status.rc, CMPI_RC_OK);

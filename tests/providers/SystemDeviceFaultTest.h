@@ -13,7 +13,6 @@
 namespace Testing::SystemDevice {
 
 inline constexpr const char* Class = "ZUMLO_SensorSystemDevice";
-inline constexpr const char* GroupClass = "ZUMLO_ComputerSystem";
 inline constexpr const char* Provider = "SensorSystemDeviceProvider";
 
 inline const RequestKinds Kinds = {
@@ -28,13 +27,8 @@ inline const RequestKind Names = Kinds.names(Keyless);
 inline const RequestKind Instances = Kinds.instances(Keyless);
 inline const RequestKind OneInstance =
     Kinds.one("oneInstance", pairMaker(Class, "GroupComponent", System, "PartComponent", Sensor));
-inline const RequestKind FromSensor[] = {Kinds.associators("Sensor", Sensor),
-    Kinds.associatorNames("Sensor", Sensor), Kinds.references("Sensor", Sensor),
-    Kinds.referenceNames("Sensor", Sensor)};
-inline const RequestKind FromSystem[] = {Kinds.associators("System", System),
-    Kinds.associatorNames("System", System), Kinds.references("System", System),
-    Kinds.referenceNames("System", System)};
-enum Which { Associators, AssociatorNames, References, ReferenceNames };
+inline const AssociationRequests FromSensor = Kinds.along("Sensor", Sensor);
+inline const AssociationRequests FromSystem = Kinds.along("System", System);
 inline const std::string Requests[] = {
     "Associators", "AssociatorNames", "References", "ReferenceNames"};
 
