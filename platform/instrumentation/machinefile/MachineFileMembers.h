@@ -1,46 +1,45 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The names of a model file's members, for its reader and its writer.
+// The members of a node in a model file, for the file's reader and its writer.
 
 #pragma once
 
-#include "platform/instrumentation/Source.h"
+#include "platform/instrumentation/machinefile/MachineFileNode.h"
 
 #include <array>
-#include <optional>
 #include <string_view>
 
 namespace Vorn::MachineFileMember {
 
 inline constexpr std::string_view nodes = "nodes"; // the document's only member
 
-// Members of a node, in the order in which they are written.
+// The members that every node has.
 inline constexpr std::string_view type = "type";
 inline constexpr std::string_view path = "path";
 inline constexpr std::string_view description = "description";
+
+// Has a default, the number of the node's type.
 inline constexpr std::string_view sensorType = "sensorType";
-inline constexpr std::string_view status = "status";
-inline constexpr std::string_view possibleStates = "possibleStates";
-inline constexpr std::string_view baseUnits = "baseUnits";
 
-struct Number {
-    std::string_view name;
-    std::optional<double> NodeReading::*value;
-};
-inline constexpr std::array<Number, 7> numbers{{
-    {"reading", &NodeReading::reading},
-    {"lowerNonCritical", &NodeReading::lowerNonCritical},
-    {"upperNonCritical", &NodeReading::upperNonCritical},
-    {"lowerCritical", &NodeReading::lowerCritical},
-    {"upperCritical", &NodeReading::upperCritical},
-    {"lowerFatal", &NodeReading::lowerFatal},
-    {"upperFatal", &NodeReading::upperFatal},
-}};
-
-// All members of a node.
-inline constexpr std::array<std::string_view, 14> all{type, path, description, sensorType, status,
-    possibleStates, baseUnits, numbers[0].name, numbers[1].name, numbers[2].name, numbers[3].name,
-    numbers[4].name, numbers[5].name, numbers[6].name};
+// Calls visit(name, field) for each member of a node, in the order in which they are written.
+template <typename Node, typename Visit>
+void forEach(Node& node, Visit visit)
+{
+    visit(type, node.type);
+    visit(path, node.path);
+    visit(description, node.description);
+    visit(sensorType, node.sensorType);
+    visit("status", node.values.status);
+    visit("possibleStates", node.values.possibleStates);
+    visit("baseUnits", node.values.baseUnits);
+    visit("reading", node.values.reading);
+    visit("lowerNonCritical", node.values.lowerNonCritical);
+    visit("upperNonCritical", node.values.upperNonCritical);
+    visit("lowerCritical", node.values.lowerCritical);
+    visit("upperCritical", node.values.upperCritical);
+    visit("lowerFatal", node.values.lowerFatal);
+    visit("upperFatal", node.values.upperFatal);
+}
 
 struct TypeName {
     std::string_view name;

@@ -9,10 +9,9 @@
 #include <nlohmann/json.hpp>
 
 #include <algorithm>
-#include <bitset>
 #include <cstdint>
 #include <limits>
-#include <memory>
+#include <optional>
 #include <sstream>
 #include <stdexcept>
 #include <string>
@@ -87,14 +86,8 @@ std::string quote(std::string_view text)
 // Returns the library's message without the name of the error and the place, which it begins with.
 std::string_view reasonOf(std::string_view message)
 {
-    const auto skip = [&](std::string_view start, std::string_view end) {
-        const std::size_t at = message.find(end);
-        if (message.starts_with(start) && at != std::string_view::npos)
-            message.remove_prefix(at + end.size());
-    };
-    skip("[json.exception", "] ");
-    skip("parse error", ": ");
-    return message;
+    const std::size_t place = message.find(": ");
+    return message.substr((place == std::string_view::npos ? message.find("] ") : place) + 2);
 }
 
 // Throws where values are nested deeper than in any model file: the parser's memory for them would
@@ -178,110 +171,95 @@ std::string described(const Json& value)
     fail(place, "expected " + expected + ", found " + described(found));
 }
 
-const Json::object_t& objectOf(const Json& value, const Place& place)
+// Returns a value of one of the types in which the parser keeps values.
+template <typename T>
+const T& require(const Json& value, const Place& place, const char* expected)
 {
-    if (!value.is_object())
-        refuse(place, "an object", value);
-    return value.get_ref<const Json::object_t&>();
+    if (const T* const found = value.get_ptr<const T*>())
+        return *found;
+    refuse(place, expected, value);
 }
 
-const Json::array_t& arrayOf(const Json& value, const Place& place, const char* expected)
+void read(
+    const Json& value, const Place& place, std::string& text, const char* expected = "a string")
 {
-    if (!value.is_array())
-        refuse(place, expected, value);
-    return value.get_ref<const Json::array_t&>();
-}
-
-const std::string& textOf(const Json& value, const Place& place, const char* expected = "a string")
-{
-    if (!value.is_string())
-        refuse(place, expected, value);
-    const auto& text = value.get_ref<const std::string&>();
+    text = require<std::string>(value, place, expected);
     if (text.find('\0') != std::string::npos)
         fail(place, "the string holds the character NUL");
-    return text;
 }
 
-std::uint32_t codeOf(const Json& value, const Place& place)
+void read(const Json& value, const Place& place, NodeLexicon::NodeType& type)
 {
-    if (!value.is_number_unsigned() ||
-        value.get<std::uint64_t>() > std::numeric_limits<std::uint32_t>::max())
-        refuse(place, "an unsigned 32-bit integer", value);
-    return value.get<std::uint32_t>();
+    constexpr const char* expected = R"("temperature", "voltage" or "tachometer")";
+    std::string name;
+    read(value, place, name, expected);
+    for (const Member::TypeName& known : Member::typeNames) {
+        if (known.name == name) {
+            type = known.type;
+            return;
+        }
+    }
+    refuse(place, expected, value);
 }
 
-double numberOf(const Json& value, const Place& place)
+void read(const Json& value, const Place& place, unsigned& code)
+{
+    constexpr const char* expected = "an unsigned 32-bit integer";
+    const auto number = require<std::uint64_t>(value, place, expected);
+    if (number > std::numeric_limits<std::uint32_t>::max())
+        refuse(place, expected, value);
+    code = static_cast<unsigned>(number);
+}
+
+void read(const Json& value, const Place& place, std::vector<unsigned>& codes)
+{
+    for (const Json& code :
+        require<Json::array_t>(value, place, "an array of unsigned 32-bit integers")) {
+        const std::string index = std::to_string(codes.size());
+        read(code, {&place, index}, codes.emplace_back());
+    }
+}
+
+void read(const Json& value, const Place& place, double& number)
 {
     if (!value.is_number())
         refuse(place, "a number", value);
-    return value.get<double>();
+    number = value.get<double>();
 }
 
-std::vector<unsigned> codesOf(const Json& value, const Place& place)
+template <typename T>
+void read(const Json& value, const Place& place, std::optional<T>& optional)
 {
-    std::vector<unsigned> codes;
-    for (const Json& code : arrayOf(value, place, "an array of unsigned 32-bit integers")) {
-        const std::string index = std::to_string(codes.size());
-        codes.push_back(codeOf(code, {&place, index}));
-    }
-    return codes;
-}
-
-NodeLexicon::NodeType typeOf(const Json& value, const Place& place)
-{
-    constexpr const char* expected = R"("temperature", "voltage" or "tachometer")";
-    const std::string& name = textOf(value, place, expected);
-    for (const Member::TypeName& known : Member::typeNames)
-        if (known.name == name)
-            return known.type;
-    refuse(place, expected, value);
+    read(value, place, optional.emplace());
 }
 
 void readMember(std::string_view name, const Json& value, const Place& place, MachineFileNode& node)
 {
-    if (name == Member::type)
-        node.type = typeOf(value, place);
-    else if (name == Member::path)
-        node.path = textOf(value, place);
-    else if (name == Member::description)
-        node.description = textOf(value, place);
-    else if (name == Member::sensorType)
-        node.sensorType = codeOf(value, place);
-    else if (name == Member::status)
-        node.values.status = codeOf(value, place);
-    else if (name == Member::baseUnits)
-        node.values.baseUnits = codeOf(value, place);
-    else if (name == Member::possibleStates)
-        node.values.possibleStates = codesOf(value, place);
-    for (const Member::Number& number : Member::numbers)
-        if (name == number.name)
-            node.values.*number.value = numberOf(value, place);
-}
-
-std::size_t memberIndex(std::string_view name)
-{
-    return static_cast<std::size_t>(
-        std::find(Member::all.begin(), Member::all.end(), name) - Member::all.begin());
+    bool isKnown = false;
+    Member::forEach(node, [&](std::string_view known, auto& field) {
+        if (known != name)
+            return;
+        isKnown = true;
+        read(value, place, field);
+    });
+    if (!isKnown)
+        fail(place, "there is no such member");
 }
 
 MachineFileNode nodeOf(const Json& value, const Place& place)
 {
     MachineFileNode node;
-    std::bitset<Member::all.size()> seen;
-    for (const auto& [name, member] : objectOf(value, place)) {
-        const Place memberPlace{&place, name};
-        const std::size_t index = memberIndex(name);
-        if (index == seen.size())
-            fail(memberPlace, "there is no such member");
-        if (seen[index])
+    const auto& members = require<Json::object_t>(value, place, "an object");
+    for (auto member = members.begin(); member != members.end(); ++member) {
+        const Place memberPlace{&place, member->first};
+        if (members.find(member->first) != member) // the first of the name
             fail(memberPlace, "the member is there twice");
-        seen.set(index);
-        readMember(name, member, memberPlace, node);
+        readMember(member->first, member->second, memberPlace, node);
     }
     for (const std::string_view name : {Member::type, Member::path, Member::description})
-        if (!seen[memberIndex(name)])
+        if (members.count(std::string(name)) == 0)
             fail(place, "member \"" + std::string(name) + "\" is missing");
-    if (!seen[memberIndex(Member::sensorType)])
+    if (members.count(std::string(Member::sensorType)) == 0)
         node.sensorType = static_cast<unsigned>(node.type);
     return node;
 }
@@ -290,7 +268,7 @@ std::vector<MachineFileNode> nodesOf(const Json& value, const Place& place)
 {
     std::vector<MachineFileNode> nodes;
     std::unordered_map<std::string, std::size_t> indicesByPath;
-    for (const Json& element : arrayOf(value, place, "an array")) {
+    for (const Json& element : require<Json::array_t>(value, place, "an array")) {
         const std::string index = std::to_string(nodes.size());
         const Place nodePlace{&place, index};
         MachineFileNode node = nodeOf(element, nodePlace);
@@ -309,7 +287,7 @@ std::vector<MachineFileNode> readMachineFile(std::string_view text)
 {
     const Json value = parsed(text);
     const Place document;
-    const auto& members = objectOf(value, document);
+    const auto& members = require<Json::object_t>(value, document, "an object");
     for (const auto& [name, member] : members)
         if (name != Member::nodes)
             fail({&document, name}, "there is no such member");

@@ -15,7 +15,7 @@ namespace Member = MachineFileMember;
 
 namespace {
 
-std::string_view nameOf(NodeLexicon::NodeType type)
+nlohmann::ordered_json toJson(NodeLexicon::NodeType type)
 {
     for (const Member::TypeName& known : Member::typeNames)
         if (known.type == type)
@@ -23,24 +23,35 @@ std::string_view nameOf(NodeLexicon::NodeType type)
     return {};
 }
 
+nlohmann::ordered_json toJson(const std::string& text)
+{
+    return Text::toValidUtf8(text);
+}
+
+nlohmann::ordered_json toJson(unsigned code)
+{
+    return code;
+}
+
+// Returns null, which is not written, where there is no finite number.
+nlohmann::ordered_json toJson(const std::optional<double>& number)
+{
+    return number && std::isfinite(*number) ? nlohmann::ordered_json(*number) : nullptr;
+}
+
+template <typename T>
+nlohmann::ordered_json toJson(const std::optional<T>& optional)
+{
+    return optional ? nlohmann::ordered_json(*optional) : nullptr;
+}
+
 nlohmann::ordered_json toJson(const MachineFileNode& node)
 {
-    nlohmann::ordered_json json;
-    const auto set = [&](std::string_view name, nlohmann::ordered_json value) {
-        json[std::string(name)] = std::move(value);
-    };
-    set(Member::type, nameOf(node.type));
-    set(Member::path, Text::toValidUtf8(node.path));
-    set(Member::description, Text::toValidUtf8(node.description));
-    set(Member::sensorType, node.sensorType);
-    set(Member::status, node.values.status);
-    if (node.values.possibleStates)
-        set(Member::possibleStates, *node.values.possibleStates);
-    if (node.values.baseUnits)
-        set(Member::baseUnits, *node.values.baseUnits);
-    for (const Member::Number& number : Member::numbers)
-        if (const auto value = node.values.*number.value; value && std::isfinite(*value))
-            set(number.name, *value);
+    auto json = nlohmann::ordered_json::object();
+    Member::forEach(node, [&](std::string_view name, const auto& field) {
+        if (auto value = toJson(field); !value.is_null())
+            json[std::string(name)] = std::move(value);
+    });
     return json;
 }
 

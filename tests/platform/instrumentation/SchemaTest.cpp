@@ -44,7 +44,11 @@ TEST(SchemaTest, HasTheMembersThatTheReaderHas)
     std::vector<std::string> names;
     for (const auto& [name, member] : node.at("properties").items())
         names.push_back(name);
-    EXPECT_THAT(names, UnorderedElementsAreArray(Member::all));
+    std::vector<std::string_view> readNames;
+    Vorn::MachineFileNode machineFileNode;
+    Member::forEach(machineFileNode,
+        [&](std::string_view name, const auto& /*field*/) { readNames.push_back(name); });
+    EXPECT_THAT(names, UnorderedElementsAreArray(readNames));
     EXPECT_EQ(node.at("required"), (nlohmann::json{"type", "path", "description"}));
     EXPECT_EQ(node.at("additionalProperties"), false);
     EXPECT_EQ(document.at("required"), nlohmann::json{Member::nodes});
@@ -63,8 +67,12 @@ TEST(SchemaTest, HasTheTypesThatTheReaderHas)
 TEST(SchemaTest, NumbersAreTheNumbersOfTheReader)
 {
     const auto members = schema().at("/$defs/node/properties"_json_pointer);
-    for (const Member::Number& number : Member::numbers)
-        EXPECT_EQ(members.at(std::string(number.name)).at("type"), "number");
+    Vorn::MachineFileNode node;
+    Member::forEach(node, [&]<typename Field>(std::string_view name, const Field& /*field*/) {
+        if constexpr (std::is_same_v<Field, std::optional<double>>) {
+            EXPECT_EQ(members.at(std::string(name)).at("type"), "number");
+        }
+    });
     EXPECT_EQ(schema().at("/$defs/code/maximum"_json_pointer), 4294967295U);
 }
 
