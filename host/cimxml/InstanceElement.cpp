@@ -14,9 +14,9 @@ namespace Host::CimXml {
 
 namespace {
 
-void writeOne(std::string& out, const Value& value)
+// Appends the content of VALUE.
+void writeContent(std::string& out, const Value& value)
 {
-    out += "<VALUE>";
     if (const Instance* const embedded = value.instance()) {
         std::string text;
         InstanceMarkup().write(text, *embedded, nullptr);
@@ -24,12 +24,17 @@ void writeOne(std::string& out, const Value& value)
     } else {
         appendLiteral(out, value);
     }
-    out += "</VALUE>";
 }
 
-// Appends the property's element without its value. Returns the offset at which the value is to be
-// inserted.
-std::size_t writeFrame(std::string& out, std::string_view name, CMPIType valueType,
+// Returns whether the value is written as one VALUE, not as nothing, an array or a reference.
+bool isSingle(const Value& value)
+{
+    return !value.isNull() && !isArrayType(value.type()) && value.type() != CMPI_ref;
+}
+
+// Appends the property's element with an empty VALUE where its value is a single one, else without
+// a value. Returns the offset at which the value is to be inserted.
+std::size_t writeFrame(std::string& out, std::string_view name, CMPIType valueType, bool isSingle,
     const ClassDeclaration* declared, const ObjectSelection& selection)
 {
     const PropertyDeclaration* const property =
@@ -53,6 +58,9 @@ std::size_t writeFrame(std::string& out, std::string_view name, CMPIType valueTy
         writeEmbeddedObject(element, property->qualifiers);
     if (property != nullptr)
         writeQualifiers(out, property->qualifiers, selection);
+    if (!isSingle)
+        return out.size();
+    const Markup single(out, "VALUE");
     return out.size();
 }
 
@@ -60,16 +68,16 @@ std::size_t writeFrame(std::string& out, std::string_view name, CMPIType valueTy
 
 void writeValue(std::string& out, const Value& value)
 {
-    if (value.isNull())
-        return;
-    if (const Array* const array = value.array()) {
+    if (isSingle(value)) {
+        out.append(std::string_view("<VALUE>"));
+        writeContent(out, value);
+        out.append(std::string_view("</VALUE>"));
+    } else if (const Array* const array = value.array()) {
         const Markup element(out, array->type() == CMPI_ref ? "VALUE.REFARRAY" : "VALUE.ARRAY");
         for (const Value& each : array->elements())
             writeValue(out, each);
     } else if (const ObjectPath* const reference = value.path()) {
         writeReference(out, *reference);
-    } else {
-        writeOne(out, value);
     }
 }
 
@@ -85,32 +93,33 @@ void InstanceMarkup::write(
     if (declared != nullptr)
         writeQualifiers(out, declared->qualifiers, selection_);
     for (const auto& [name, value] : instance.properties()) {
-        const Frame& frame = frameFor(*name->text(), value.type());
+        const Frame& frame = frameFor(*name->text(), value);
         if (frame.text.empty())
             continue;
         out.append(frame.text, 0, frame.valueAt);
-        writeValue(out, value);
+        if (frame.isSingle)
+            writeContent(out, value);
+        else
+            writeValue(out, value);
         out.append(frame.text, frame.valueAt);
     }
 }
 
 // Instances of a class mostly have the same properties in the same order.
-const InstanceMarkup::Frame& InstanceMarkup::frameFor(std::string_view property, CMPIType valueType)
+const InstanceMarkup::Frame& InstanceMarkup::frameFor(std::string_view property, const Value& value)
 {
     for (std::size_t tried = 0; tried < frames_.size(); ++tried) {
         const Frame& next = frames_[next_];
         next_ = next_ + 1 == frames_.size() ? 0 : next_ + 1;
-        if (next.valueType == valueType && next.property == property)
+        if (next.valueType == value.type() && next.isSingle == isSingle(value) &&
+            next.property == property)
             return next;
     }
-    return frames_.emplace_back(makeFrame(property, valueType));
-}
-
-InstanceMarkup::Frame InstanceMarkup::makeFrame(std::string_view name, CMPIType valueType) const
-{
-    Frame frame{std::string(name), valueType, {}, 0};
-    if (isSelected(selection_, declared_, name))
-        frame.valueAt = writeFrame(frame.text, name, valueType, declared_, selection_);
+    Frame& frame =
+        frames_.emplace_back(Frame{std::string(property), value.type(), isSingle(value), {}, 0});
+    if (isSelected(selection_, declared_, property))
+        frame.valueAt = writeFrame(
+            frame.text, property, frame.valueType, frame.isSingle, declared_, selection_);
     return frame;
 }
 

@@ -32,16 +32,16 @@ public:
     void write(std::string& out, const Instance& instance, const ClassDeclaration* declared);
 
 private:
-    // The element of a property whose value is of that type, without the value.
+    // The element of a property, without its value.
     struct Frame {
         std::string property;
         CMPIType valueType = CMPI_null;
-        std::string text; // empty when the property is not selected
+        bool isSingle = false; // the value is the content of one VALUE
+        std::string text;      // empty when the property is not selected
         std::size_t valueAt = 0;
     };
 
-    const Frame& frameFor(std::string_view property, CMPIType valueType);
-    Frame makeFrame(std::string_view name, CMPIType valueType) const;
+    const Frame& frameFor(std::string_view property, const Value& value);
 
     ObjectSelection selection_;
     const ClassDeclaration* declared_ = nullptr;

@@ -112,7 +112,8 @@ template <typename Number>
 void appendNumber(std::string& out, Number number)
 {
     std::array<char, 32> buffer{};
-    out.append(buffer.data(), std::to_chars(buffer.begin(), buffer.end(), number).ptr);
+    const char* const end = std::to_chars(buffer.begin(), buffer.end(), number).ptr;
+    out.append(buffer.data(), static_cast<std::size_t>(end - buffer.data()));
 }
 
 // Appends the shortest text that converts back to the same number, with the decimal point that
