@@ -39,6 +39,7 @@ if(SENSOR_PROFILE_FUZZ)
 endif()
 
 if(SENSOR_PROFILE_COVERAGE)
-  add_compile_options(--coverage)
+  # Counters that threads share would otherwise lose counts, even below zero.
+  add_compile_options(--coverage -fprofile-update=atomic)
   add_link_options(--coverage)
 endif()

@@ -15,7 +15,7 @@ build_packages=(
 check_packages=(
   "${build_packages[@]}"
   clang clang-format clang-tidy libclang-rt-14-dev
-  libgmock-dev libgtest-dev
+  libbenchmark-dev libgmock-dev libgtest-dev
   binutils lm-sensors locales util-linux
   openssl sblim-wbemcli
   debootstrap dpkg-dev file iproute2 lintian man-db mandoc shellcheck systemd
