@@ -5,17 +5,13 @@
 # sensor-profile-register.
 
 choose_provider_folder() {
-  local each known
+  local folder
   is_folder_known=true
   used_folder=$provider_folder
+  while [ -z "$used_folder" ] && read -r folder; do
+    [ ! -d "$folder" ] || used_folder=$folder
+  done < <(provider_folders)
   [ -z "$used_folder" ] || return 0
-  read -ra known < <(folders_of "$object_manager")
-  for each in "${known[@]}"; do
-    if [ -d "$each" ]; then
-      used_folder=$each
-      return
-    fi
-  done
   used_folder=$library_folder
   is_folder_known=false
 }

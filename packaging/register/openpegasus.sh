@@ -3,6 +3,9 @@
 
 # Registering in OpenPegasus. Sourced by sensor-profile-register.
 
+# Where packages of it look for provider libraries.
+provider_folders() { printf '%s\n' /usr/lib64/Pegasus/providers /usr/lib/Pegasus/providers; }
+
 modules=(SensorProfileModule SensorProfileComputerSystemModule)
 
 # Sets `registered` to those of our modules that are registered with OpenPegasus.
@@ -31,13 +34,16 @@ remove_modules() {
 }
 
 openpegasus_register() {
-  local each
+  # -uc alone replaces a class of the same major version only.
+  local sensors=(-uc -aV) system=(-uc -aV)
+  # An association refers to ZUMLO_ComputerSystem. Without -uc the class is added where it is missing
+  # and left as it is where somebody else defined it; -w suppresses the warning that it is there.
+  "$with_computer_system" || system=(-w)
   find_registered_modules
   document sensor-profile-registration.mof '/^\/\/ The computer system,/,$'
   link_libraries
-  for each in "${classes[@]}"; do
-    step cimmof -uc -n "$namespace" "$each"
-  done
+  step cimmof "${system[@]}" -n "$namespace" "$share/sensor-profile-computer-system.mof"
+  step cimmof "${sensors[@]}" -n "$namespace" "$share/sensor-profile.mof"
   remove_modules
   step cimmof -n root/PG_InterOp "$registration"
   unlink_former_library

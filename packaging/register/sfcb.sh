@@ -2,39 +2,82 @@
 # shellcheck shell=bash disable=SC2034,SC2154
 
 # Registering in sfcb. It keeps what is staged below one folder: registration files in regs,
-# classes in mofs/NAMESPACE. Sourced by sensor-profile-register.
+# classes in mofs/NAMESPACE. Its configuration names the registration folder, in which sfcbrepos
+# builds the repository from them, and the staging folder lies beside that. Sourced by
+# sensor-profile-register.
 
 registration_name=sensor-profile.reg
 class_names=(sensor-profile-computer-system.mof sensor-profile.mof)
 # What a removal found.
 was_registered=false
 
-# Finds our files in `stage`, and sets `registered_in` to the namespace that the registration file
-# names; empty when there is none.
-look_at_stage() {
-  local file options=()
-  stage=${staging_folder:-/var/lib/sfcb/stage}
-  staging=()
-  [ -z "$staging_folder" ] || staging=(-s "$staging_folder")
-  file=$stage/regs/$registration_name
-  registered_in=''
+# ---- The folders
+
+# The configuration that was named, or the one of the installation that sfcbrepos belongs to.
+configuration_file() {
+  local prefix
+  prefix=$(dirname "$(dirname "$(command -v sfcbrepos)")")
+  [ "$prefix" != /usr ] || prefix=''
+  printf '%s' "${configuration:-$prefix/etc/sfcb/sfcb.cfg}"
+}
+
+# The value of a setting; nothing where it is not configured.
+configured() {
+  local file
+  file=$(configuration_file)
+  [ ! -r "$file" ] || sed -n "s/^[[:blank:]]*$1:[[:blank:]]*\([^[:blank:]].*\)/\1/p" "$file" | tail -n 1
+}
+
+# Where it looks for provider libraries, the best place first: the folder of ours, or the last one,
+# since the first ones have those of sfcb itself.
+provider_folders() {
+  local each folders
+  if ! read -ra folders < <(configured providerDirs); then
+    printf '%s\n' /usr/lib64/cmpi /usr/lib/cmpi
+    return
+  fi
+  for each in "${folders[@]}"; do
+    if is_same_folder "$each" "$library_folder"; then echo "$each"; fi
+  done
+  printf '%s\n' "${folders[@]}" | tac
+}
+
+# Sets `stage`, and `repository_options`, by which sfcbrepos finds the folders.
+find_stage() {
+  local folder
+  stage=/var/lib/sfcb/stage
+  repository_options=()
+  if read -r folder < <(configured registrationDir); then
+    stage=$(dirname "$folder")/stage
+    repository_options=(-r "$folder")
+  fi
+  stage=${staging_folder:-$stage}
+  [ -d "$stage" ] ||
+    refuse "$stage is no folder: --staging-folder or --configuration says where sfcb keeps what" \
+      "is staged"
   refuse_unreadable_stage
-  [ -e "$file" ] || return 0
-  registered_in=$(sed -n '/^ *namespace: */{s///;p;q}' "$file")
-  grep --quiet '^\[ZUMLO_ComputerSystem\]' "$file" || options+=(--without-computer-system)
-  earlier_command=$(command_to register --namespace "$registered_in" "${options[@]}")
 }
 
 # What lies in a folder that cannot be looked into would pass for not being staged.
 refuse_unreadable_stage() {
   local folder
-  [ -d "$stage" ] || return 0
   folder=$(find "$stage" -type d \( ! -readable -o ! -executable \) -print -quit 2>/dev/null) ||
     true
   [ -z "$folder" ] || refuse "$folder cannot be read"
 }
 
-removal_command() { command_to remove --namespace "$namespace"; }
+# ---- What is staged
+
+# Sets `registered_in` to the namespace that our staged registration file names; empty when there is
+# none.
+find_registration() {
+  local file=$stage/regs/$registration_name options=()
+  registered_in=''
+  [ -e "$file" ] || return 0
+  registered_in=$(sed -n '/^ *namespace: */{s///;p;q}' "$file")
+  grep --quiet '^\[ZUMLO_ComputerSystem\]' "$file" || options+=(--without-computer-system)
+  earlier_command=$(command_to register --namespace "$registered_in" "${options[@]}")
+}
 
 # The namespaces that have classes of ours staged.
 staged_namespaces() {
@@ -64,39 +107,80 @@ outdated_classes() {
   "$with_computer_system" || existing "$stage/mofs/$namespace/${class_names[0]}"
 }
 
-sfcb_register() {
-  local each outdated
-  look_at_stage
-  document $registration_name '/^\[ZUMLO_ComputerSystem\]$/,/^#$/'
-  link_libraries
+# What a removal takes away: of one namespace, or everything.
+staged_files() {
+  staged_classes ${namespace:+"$namespace"}
+  "$keeps_registration" || existing "$stage/regs/$registration_name"
+}
+
+# ---- Changing it
+
+# A failure of sfcbrepos leaves sfcb without classes. Hence all is tried in a copy first: the
+# functions below run each command through the one that is given, attempt or step.
+
+build_repository() { "$1" sfcbrepos -s "$stage" "${repository_options[@]}" -f; }
+
+stage_providers() {
+  local each outdated classes=("${class_names[@]}")
+  "$with_computer_system" || classes=("${class_names[1]}")
   for each in "${classes[@]}"; do
-    step sfcbstage "${staging[@]}" -n "$namespace" -r "$registration" "$each"
+    "$1" sfcbstage -s "$stage" -n "$namespace" -r "$registration" "$share/$each"
   done
   mapfile -t outdated < <(outdated_classes)
-  [ ${#outdated[@]} -eq 0 ] || step rm "${outdated[@]}"
-  step sfcbrepos "${staging[@]}" -f
+  [ ${#outdated[@]} -eq 0 ] || "$1" rm "${outdated[@]}"
+  build_repository "$1"
+}
+
+unstage_providers() {
+  local staged
+  mapfile -t staged < <(staged_files)
+  [ ${#staged[@]} -eq 0 ] || "$1" rm "${staged[@]}"
+  # Even if nothing was staged: an earlier attempt may have failed here.
+  build_repository "$1"
+}
+
+attempt() {
+  local status=0
+  "$@" >log 2>&1 || status=$?
+  [ $status -eq 0 ] && return
+  sed "s|$stage/|$original/|g" log >&2
+  refuse "tried in a copy of $original, $1 failed with exit code $status"
+}
+
+# Runs the function in a copy of the staging folder, and of the repository, whose instances
+# sfcbrepos carries over.
+try_in_copy() {
+  local original=$stage repository=${repository_options[1]-}
+  local stage=$work/stage repository_options=(-r "$work/registration")
+  "$is_dry_run" && return
+  cp -a "$original" "$stage"
+  [ ! -d "$repository" ] || cp -a "$repository" "$work/registration"
+  "$1" attempt
+}
+
+sfcb_register() {
+  find_stage
+  find_registration
+  document $registration_name '/^\[ZUMLO_ComputerSystem\]$/,/^#$/'
+  try_in_copy stage_providers
+  link_libraries
+  stage_providers step
   unlink_former_library
 }
 
-# With a namespace, that one; else all.
 sfcb_remove() {
-  local staged
-  look_at_stage
-  [ -d "$stage" ] ||
-    refuse "$stage is no folder: --staging-folder says where sfcb keeps what is staged"
-  mapfile -t staged < <(staged_classes ${namespace:+"$namespace"})
-  if [ -n "$registered_in" ] && [ -n "$namespace" ] && [ "$namespace" != "$registered_in" ]; then
+  local keeps_registration=false
+  find_stage
+  find_registration
+  if [ -n "$registered_in" ] && [ "${namespace:-$registered_in}" != "$registered_in" ]; then
+    keeps_registration=true
     echo "The registration stays: it is for $registered_in."
-    [ ${#staged[@]} -gt 0 ] || return 0
-    was_registered=true
-    step rm "${staged[@]}"
-    step sfcbrepos "${staging[@]}" -f
-    return
+    [ -n "$(staged_files)" ] || return 0
   fi
-  [ -z "$registered_in" ] || staged+=("$stage/regs/$registration_name")
-  if [ ${#staged[@]} -gt 0 ] || has_links; then was_registered=true; fi
-  [ ${#staged[@]} -eq 0 ] || step rm "${staged[@]}"
-  # Even if nothing was staged: an earlier attempt may have failed here.
-  step sfcbrepos "${staging[@]}" -f
-  unlink_libraries
+  if [ -n "$(staged_files)" ] || has_links; then was_registered=true; fi
+  try_in_copy unstage_providers
+  unstage_providers step
+  "$keeps_registration" || unlink_libraries
 }
+
+removal_command() { command_to remove --namespace "$namespace"; }

@@ -23,8 +23,10 @@ quoted() {
 command_to() {
   local words=("$own_command" "$1" --object-manager "$object_manager" "${@:2}")
   [ -z "$provider_folder" ] || words+=(--provider-folder "$provider_folder")
-  [ "$object_manager" != sfcb ] || [ -z "$staging_folder" ] ||
-    words+=(--staging-folder "$staging_folder")
+  if [ "$object_manager" = sfcb ]; then
+    [ -z "$staging_folder" ] || words+=(--staging-folder "$staging_folder")
+    [ -z "$configuration" ] || words+=(--configuration "$configuration")
+  fi
   quoted "${words[@]}"
 }
 
@@ -35,8 +37,10 @@ refuse() {
   exit 1
 }
 
-# The step that failed, those before it, and the way out of them.
+# The step that failed, those before it, and the way back: to the registration that was found, or to
+# none.
 report_failure() {
+  local undo
   complain "$1"
   if [ ${#steps_done[@]} -eq 0 ]; then
     echo "It may have done part of its work; nothing was done before it." >&2
@@ -44,13 +48,9 @@ report_failure() {
     echo "It may have done part of its work. Done before it:" >&2
     printf '  %s\n' "${steps_done[@]}" >&2
   fi
-  if [ "$action" = register ]; then
-    echo "To undo it: $(removal_command)" >&2
-    [ -z "$earlier_command" ] ||
-      echo "Then, for what was registered before: $earlier_command" >&2
-  elif [ -n "$earlier_command" ]; then
-    echo "To undo it: $earlier_command" >&2
-  fi
+  undo=$earlier_command
+  [ -n "$undo" ] || [ "$action" = remove ] || undo=$(removal_command)
+  [ -z "$undo" ] || echo "To undo it: $undo" >&2
   echo "Once the cause is mended, the command can be repeated." >&2
   exit 1
 }

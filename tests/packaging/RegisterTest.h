@@ -25,8 +25,10 @@ protected:
     // The stand-ins of these commands are all there is of object managers.
     explicit RegisterTest(const Lines& commands)
     {
-        std::filesystem::create_directory(path("providers"));
-        std::filesystem::create_directory(path("stage"));
+        for (const char* const name : {"providers", "stage", "CIM"})
+            std::filesystem::create_directory(path(name));
+        folder_.write("stage/default.reg", "");
+        folder_.write("CIM/CIM_Schema.mof", "");
         for (const std::string& command : commands)
             addCommand(command);
     }
@@ -155,8 +157,8 @@ private:
     }
 };
 
-// Whichever step fails, the message lists the steps before it, and the commands that it names lead
-// back to what was before. The object manager's class says how many calls come before all steps.
+// Whichever step fails, the message lists the steps before it, and the command that it names leads
+// back to what was before.
 template <typename ObjectManager>
 class EveryStepOf : public ObjectManager, public ::testing::WithParamInterface<std::size_t> {
 protected:
@@ -168,12 +170,12 @@ protected:
         this->addCommand("rm");
     }
 
-    // Runs what fails at the parameter's step.
-    std::string failing(const Lines& arguments, const Lines& steps)
+    // Runs what fails at the parameter's step, after so many calls that are no steps.
+    std::string failing(std::size_t callsBefore, const Lines& arguments, const Lines& steps)
     {
         const std::size_t done = this->GetParam();
         this->calls();
-        this->failAt(ObjectManager::callsBeforeSteps + done + 1);
+        this->failAt(callsBefore + done + 1);
         const Ended ended = this->runRegister(arguments);
         this->failNoMore();
         EXPECT_EQ(ended.code, 1);

@@ -7,9 +7,12 @@
 
 #include <unistd.h>
 
+#include <tuple>
+
 namespace SfcbTests {
 
 using testing::AllOf;
+using testing::AnyOf;
 using testing::ElementsAre;
 using testing::HasSubstr;
 using testing::IsEmpty;
@@ -21,9 +24,38 @@ class SfcbTest : public RegisterTest {
 protected:
     SfcbTest() : RegisterTest({"sfcbstage", "sfcbrepos"}) {}
 
-    static constexpr std::size_t callsBeforeSteps = 0;
+    // What is staged beside sfcb's own.
+    Lines stage() const
+    {
+        Lines files = filesBelow(path("stage"));
+        std::erase(files, "default.reg");
+        return files;
+    }
 
-    Lines stage() const { return filesBelow(path("stage")); }
+    // The calls that change something: what comes before is tried in a copy.
+    Lines steps() const
+    {
+        Lines all = calls();
+        std::erase_if(all, [this](const std::string& call) {
+            return call.find(" -s " + path("stage") + " ") == call.npos;
+        });
+        return all;
+    }
+
+    std::string repository() const
+    {
+        return contentOf(path("registration/repository/root/cimv2/classes"));
+    }
+
+    void expectRefusalWithoutChange(const std::string& action, const std::string& reason) const
+    {
+        const auto before = std::tuple(filesBelow(path("stage")), links(), repository());
+        const Ended ended = runRegister({action});
+        EXPECT_EQ(ended.code, 1);
+        EXPECT_THAT(
+            ended.err, AllOf(HasSubstr(reason), testing::EndsWith("Nothing was changed.\n")));
+        EXPECT_EQ(std::tuple(filesBelow(path("stage")), links(), repository()), before);
+    }
 
     std::string stagedRegistration() const
     {
@@ -47,7 +79,7 @@ protected:
 TEST_F(SfcbTest, StagesTheFilesAndBuildsTheRepository)
 {
     EXPECT_THAT(mustRun({"register"}), HasSubstr("sfcb must be restarted"));
-    EXPECT_THAT(calls(), ElementsAre(stageStep(computerSystem_), stageStep(sensors_), buildStep_));
+    EXPECT_THAT(steps(), ElementsAre(stageStep(computerSystem_), stageStep(sensors_), buildStep_));
     EXPECT_THAT(stage(), ElementsAre("mofs/root/cimv2/sensor-profile-computer-system.mof",
                              "mofs/root/cimv2/sensor-profile.mof", "regs/sensor-profile.reg"));
     EXPECT_EQ(stagedRegistration(), contentOf(shared("registration/sensor-profile.reg")));
@@ -55,13 +87,99 @@ TEST_F(SfcbTest, StagesTheFilesAndBuildsTheRepository)
         links(), ElementsAre("libSensorProfileComputerSystem.so", "libSensorProfileProvider.so"));
 }
 
-TEST_F(SfcbTest, NamesNoFoldersThatNobodyNamed)
+class ConfiguredSfcbTest : public SfcbTest {
+protected:
+    ConfiguredSfcbTest()
+    {
+        for (const char* const name : {"own/stage", "own/lib", "own/lib/cmpi", "etc/sfcb"})
+            fs::create_directories(path(name));
+        folder_.write("own/stage/default.reg", "");
+    }
+
+    // With folders that the configuration may have commented out.
+    void configure(const std::string& file, const std::string& registration) const
+    {
+        folder_.write(file, "##  Locations\n#registrationDir: /none\nregistrationDir: " +
+                                registration + " \n  providerDirs:\t" + path("own/lib") + " " +
+                                path("own/lib/cmpi") + " /no/such\nhttpPort: 5988\n");
+    }
+
+    const std::string build_ =
+        "sfcbrepos -s " + path("own/stage") + " -r " + path("own/registration") + " -f";
+};
+
+TEST_F(ConfiguredSfcbTest, HasTheFoldersOfTheConfigurationBesideItsProgram)
 {
-    EXPECT_THAT(plan({"register"}),
-        AllOf(HasSubstr("sfcbstage -n root/cimv2 -r " + shared("registration/sensor-profile.reg") +
-                        " " + shared(sensors_) + "\n"),
-            HasSubstr("\nsfcbrepos -f\n")));
-    EXPECT_THAT(calls(), IsEmpty());
+    configure("etc/sfcb/sfcb.cfg", path("own/registration"));
+    for (int time = 0; time < 2; ++time) {
+        EXPECT_EQ(runAsTyped({"register"}).code, 0);
+        EXPECT_THAT(calls(), AllOf(testing::SizeIs(6), testing::Contains(build_)));
+        EXPECT_THAT(
+            filesBelow(path("own/lib")), ElementsAre("cmpi/libSensorProfileComputerSystem.so",
+                                             "cmpi/libSensorProfileProvider.so"));
+        EXPECT_THAT(filesBelow(path("own/registration")),
+            ElementsAre("providerRegister", "repository/root/cimv2/classes"));
+    }
+    EXPECT_EQ(runAsTyped({"remove"}).code, 0);
+    EXPECT_THAT(filesBelow(path("own/lib")), IsEmpty());
+    EXPECT_THAT(filesBelow(path("own/stage")), ElementsAre("default.reg"));
+}
+
+TEST_F(ConfiguredSfcbTest, TakesTheConfigurationThatIsNamed)
+{
+    configure("etc/sfcb/sfcb.cfg", "/no/such");
+    configure("other.cfg", path("own/registration"));
+    EXPECT_THAT(plan({"register", "--configuration", path("other.cfg")}), HasSubstr(build_ + "\n"));
+    failAt(4);
+    const Ended ended = runAsTyped({"register", "--configuration=" + path("other.cfg")});
+    failNoMore();
+    EXPECT_THAT(ended.err, HasSubstr("To undo it: " + program_ +
+                                     " remove --object-manager sfcb "
+                                     "--namespace root/cimv2 --configuration " +
+                                     path("other.cfg") + "\n"));
+}
+
+TEST_F(ConfiguredSfcbTest, TakesTheFoldersThatAreNamed)
+{
+    configure("etc/sfcb/sfcb.cfg", path("own/registration"));
+    const std::string planned = plan(
+        {"register", "--provider-folder", path("providers"), "--staging-folder", path("stage")});
+    EXPECT_THAT(planned, AllOf(HasSubstr(linkStep(sensorLibrary_)),
+                             HasSubstr("sfcbrepos -s " + path("stage") + " -r " +
+                                       path("own/registration") + " -f\n")));
+}
+
+TEST_F(ConfiguredSfcbTest, LinksNothingWhereItLooksInTheFolderOfTheLibraries)
+{
+    folder_.write("etc/sfcb/sfcb.cfg", "providerDirs: " + library() + " " + path("own/lib") + "\n");
+    EXPECT_THAT(plan({"register", "--staging-folder", path("stage")}),
+        Not(AnyOf(HasSubstr("ln -s"), HasSubstr("must look"))));
+}
+
+// Files that are staged beside ours, such as classes that the CIM schema has, too.
+TEST_F(SfcbTest, ChangesNothingWhenTheRepositoryCannotBeBuilt)
+{
+    for (const std::string before : {"nothing", "register"}) {
+        if (before == "register")
+            mustRun({before});
+        fs::create_directories(path("stage/mofs/root/cimv2"));
+        folder_.write("stage/mofs/root/cimv2/10-cim.mof", "class CIM_ManagedElement {\n");
+        for (const char* const action : {"register", "remove"}) {
+            SCOPED_TRACE(before + ", then " + action);
+            expectRefusalWithoutChange(
+                action, "error in " + path("stage/mofs/root/cimv2/10-cim.mof"));
+        }
+        fs::remove(path("stage/mofs/root/cimv2/10-cim.mof"));
+    }
+    EXPECT_THAT(repository(), HasSubstr("ZUMLO_NumericSensor"));
+    mustRun({"remove"});
+    EXPECT_EQ(repository(), "");
+}
+
+TEST_F(SfcbTest, ChangesNothingWithoutTheCimSchema)
+{
+    fs::remove(path("CIM/CIM_Schema.mof"));
+    expectRefusalWithoutChange("register", "sfcbrepos failed with exit code 1");
 }
 
 TEST_F(SfcbTest, RepeatingDoesTheSameAgain)
@@ -69,7 +187,7 @@ TEST_F(SfcbTest, RepeatingDoesTheSameAgain)
     mustRun({"register"});
     calls();
     mustRun({"register"});
-    EXPECT_THAT(calls(), ElementsAre(stageStep(computerSystem_), stageStep(sensors_), buildStep_));
+    EXPECT_THAT(steps(), ElementsAre(stageStep(computerSystem_), stageStep(sensors_), buildStep_));
     EXPECT_EQ(stage().size(), 3U);
     EXPECT_EQ(links().size(), 2U);
 }
@@ -80,7 +198,7 @@ TEST_F(SfcbTest, RemovesWhatWasStaged)
     calls();
     folder_.write("stage/regs/other.reg", "somebody else's");
     EXPECT_THAT(mustRun({"remove"}), HasSubstr("Removed. sfcb must be restarted"));
-    EXPECT_THAT(calls(), ElementsAre(buildStep_));
+    EXPECT_THAT(steps(), ElementsAre(buildStep_));
     EXPECT_THAT(stage(), ElementsAre("regs/other.reg"));
     EXPECT_THAT(links(), IsEmpty());
     EXPECT_THAT(mustRun({"remove"}),
@@ -162,7 +280,7 @@ TEST_F(SfcbTest, RegisteringInAnotherNamespaceMovesTheClasses)
     calls();
     mustRun({"register", "--namespace", "root/sensors"});
     EXPECT_THAT(
-        calls(), ElementsAre(stageStep(computerSystem_, "root/sensors", "sensor-profile.reg"),
+        steps(), ElementsAre(stageStep(computerSystem_, "root/sensors", "sensor-profile.reg"),
                      stageStep(sensors_, "root/sensors", "sensor-profile.reg"), buildStep_));
     EXPECT_THAT(stage(), ElementsAre("mofs/root/cimv2/other.mof",
                              "mofs/root/sensors/sensor-profile-computer-system.mof",
@@ -190,7 +308,7 @@ TEST_F(SfcbTest, RemovingFromANamespaceLeavesTheRegistrationOfAnother)
     fs::create_directories(path("stage/mofs/root/a"));
     folder_.write("stage/mofs/root/a/sensor-profile.mof", "");
     mustRun({"remove", "--namespace", "root/a"});
-    EXPECT_THAT(calls(), ElementsAre(buildStep_));
+    EXPECT_THAT(steps(), ElementsAre(buildStep_));
     EXPECT_EQ(stage(), before);
     EXPECT_EQ(links().size(), 2U);
 
@@ -250,10 +368,9 @@ class EveryFirstStepOfSfcbTest : public EveryStepOf<SfcbTest> {};
 
 TEST_P(EveryFirstStepOfSfcbTest, CanFailAndBeUndone)
 {
-    const std::string message =
-        failing({"register"}, {linkStep(sensorLibrary_), linkStep(systemLibrary_),
-                                  stageStep(computerSystem_), stageStep(sensors_), buildStep_});
-    EXPECT_THAT(message, Not(HasSubstr("registered before")));
+    const std::string message = failing(3, {"register"},
+        {linkStep(sensorLibrary_), linkStep(systemLibrary_), stageStep(computerSystem_),
+            stageStep(sensors_), buildStep_});
     mustRunAdvice(message, "To undo it: ", "\n");
     EXPECT_THAT(links(), IsEmpty());
     EXPECT_THAT(stage(), IsEmpty());
@@ -270,12 +387,12 @@ TEST_P(EveryMovingStepOfSfcbTest, CanFailAndLeadBack)
     mustRun({"register", "--without-computer-system"});
     const Lines files = stage();
     const std::string registration = stagedRegistration();
-    const std::string message = failing({"register", "--namespace", "root/new"},
+    const std::string message = failing(4, {"register", "--namespace", "root/new"},
         {linkStep(systemLibrary_), stageStep(computerSystem_, "root/new", "sensor-profile.reg"),
             stageStep(sensors_, "root/new", "sensor-profile.reg"),
             "rm " + stagedMof("root/cimv2/sensor-profile.mof"), buildStep_});
+    EXPECT_THAT(message, Not(HasSubstr(" remove ")));
     mustRunAdvice(message, "To undo it: ", "\n");
-    mustRunAdvice(message, "Then, for what was registered before: ", "\n");
     EXPECT_EQ(stage(), files);
     EXPECT_EQ(stagedRegistration(), registration);
     EXPECT_THAT(links(), ElementsAre("libSensorProfileProvider.so"));
@@ -289,11 +406,11 @@ protected:
 
     std::string failingRemoval()
     {
-        return failing(
-            {"remove"}, {"rm " + stagedMof("root/s/sensor-profile-computer-system.mof") + " " +
-                                stagedMof("root/s/sensor-profile.mof") + " " +
-                                path("stage/regs/sensor-profile.reg"),
-                            buildStep_, unlinkStep(sensorLibrary_), unlinkStep(systemLibrary_)});
+        return failing(2, {"remove"},
+            {"rm " + stagedMof("root/s/sensor-profile-computer-system.mof") + " " +
+                    stagedMof("root/s/sensor-profile.mof") + " " +
+                    path("stage/regs/sensor-profile.reg"),
+                buildStep_, unlinkStep(sensorLibrary_), unlinkStep(systemLibrary_)});
     }
 };
 
