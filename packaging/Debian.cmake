@@ -3,10 +3,10 @@
 
 set(CPACK_GENERATOR DEB)
 set(CPACK_PACKAGE_NAME sensor-profile)
-# Each package says what it is by itself.
+# Each package has a summary of its own.
 set(CPACK_PACKAGE_DESCRIPTION_SUMMARY "")
 set(CPACK_PACKAGE_CONTACT "The sensor-profile authors <sensor-profile@example.org>")
-# Each package is a group: a component of the installation, and what only a package has.
+# Each package is a group: a component of the installation, and the files that only a package has.
 set(CPACK_COMPONENTS_ALL provider provider-debian tool tool-debian)
 set(CPACK_DEB_COMPONENT_INSTALL ON)
 set(CPACK_COMPONENTS_GROUPING ONE_PER_GROUP)
@@ -14,7 +14,7 @@ set(CPACK_STRIP_FILES ON)
 # The unit and its settings lie outside of /usr.
 set(CPACK_SET_DESTDIR ON)
 set(CPACK_INSTALL_PREFIX /usr)
-# Folders are made with the umask of whoever packs, which may be a cautious one.
+# cpack creates folders with the umask of the user, which may be restrictive.
 set(CPACK_PRE_BUILD_SCRIPTS "${CMAKE_CURRENT_LIST_DIR}/OpenFolders.cmake")
 
 set(CPACK_DEBIAN_FILE_NAME DEB-DEFAULT)

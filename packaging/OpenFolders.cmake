@@ -1,4 +1,4 @@
-# Lets everybody enter and read the folders of what is about to be packed. Run by cpack.
+# Makes the folders of the packages accessible to all users. Run by cpack.
 
 file(GLOB_RECURSE entries LIST_DIRECTORIES true "${CPACK_TEMPORARY_DIRECTORY}/*")
 foreach(entry IN LISTS entries)

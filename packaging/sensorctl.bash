@@ -1,9 +1,9 @@
 # Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 # shellcheck shell=bash
 
-# Completion of sensorctl's command line in bash. What there is to complete is read from its help.
+# Completion of sensorctl's command line in bash. The completions are read from its help.
 
-# The long options that a help text lists.
+# Prints the long options in a help text.
 _sensorctl_options() {
   "$@" --help 2>/dev/null | grep --only-matching --extended-regexp -e '^  .*--[a-z-]+' |
     grep --only-matching --extended-regexp -e '--[a-z-]+'
@@ -13,7 +13,7 @@ _sensorctl_commands() {
   "$1" --help 2>/dev/null | sed -n '/^Subcommands:/,/^$/s/^  \([a-z]\{1,\}\) .*/\1/p'
 }
 
-# _sensorctl_takes TOOL COMMAND OPTION VALUE: whether such a value follows the option.
+# _sensorctl_takes TOOL COMMAND OPTION VALUE: succeeds if the option takes a value of that name.
 _sensorctl_takes() {
   [[ $3 == -* ]] && "$1" "$2" --help 2>/dev/null |
     grep --quiet --extended-regexp -e "^  ([^ ]+,)?$3(,[^ ]+)? $4\\b"
