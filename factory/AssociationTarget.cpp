@@ -38,10 +38,10 @@ constexpr std::array<AssociationEnd, 4> associationEnds = {{
         SensorElementCapabilitiesProvider, targetIsSystem, FactoryLines::targetOfCapabilities},
 }};
 
-// Compares with regard to case; null equals nothing.
-bool areEqual(const char* one, const char* other)
+// Compares with regard to case; a name that is null is no class's.
+bool isClass(const char* name, const char* className)
 {
-    return one != nullptr && other != nullptr && std::strcmp(one, other) == 0;
+    return name != nullptr && std::strcmp(name, className) == 0;
 }
 
 // Reads the characters anew for each row, since a broker may move them.
@@ -49,8 +49,8 @@ const AssociationEnd* findEnd(
     const CMPIString* sourceClass, const char* associationClass, CMPIStatus* rc)
 {
     for (const AssociationEnd& end : associationEnds)
-        if (areEqual(charactersOf(sourceClass, rc), end.sourceClass) &&
-            areEqual(associationClass, end.associationClass))
+        if (isClass(charactersOf(sourceClass, rc), end.sourceClass) &&
+            isClass(associationClass, end.associationClass))
             return &end;
     return nullptr;
 }
