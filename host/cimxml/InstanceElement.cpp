@@ -103,6 +103,10 @@ void InstanceMarkup::write(
             writeValue(out, value);
         out.append(frame.text, frame.valueAt);
     }
+    if (selection_.writesNulls && declared != nullptr)
+        for (const auto& property : declared->properties)
+            if (instance.property(property->name) == nullptr)
+                out += frameFor(property->name, Value()).text;
 }
 
 // Instances of a class mostly have the same properties in the same order.

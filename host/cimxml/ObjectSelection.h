@@ -20,6 +20,7 @@ namespace Host::CimXml {
 
 struct ObjectSelection {
     std::optional<std::vector<std::string>> properties; // all of them without a list
+    bool writesNulls = false; // for selected properties of the class that the instance lacks
     bool localOnly = false;
     bool includeQualifiers = false;
     bool includeClassOrigin = false;

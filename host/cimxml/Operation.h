@@ -53,8 +53,8 @@ struct Operation {
     OperationKind kind = OperationKind::getInstance;
     std::string nameSpace;
 
-    std::string className;            // the path's, where there is one; empty for all classes
-    const ObjectPath* path = nullptr; // of the instance, or of an association's source
+    std::string className;      // the path's, where there is one; empty for all classes
+    ObjectPath* path = nullptr; // of the instance, or of an association's source
 
     bool deepInheritance = false;
     ObjectSelection selection;
@@ -80,10 +80,11 @@ struct Operation {
 // RequestError for elements that lack something, and Refusal:
 //
 //   CMPI_RC_ERR_INVALID_NAMESPACE   there is no such namespace
-//   CMPI_RC_ERR_NOT_SUPPORTED       an operation that is not offered, or a method of a class
+//   CMPI_RC_ERR_NOT_SUPPORTED       an operation that is not offered
+//   CMPI_RC_ERR_METHOD_NOT_AVAILABLE  a method of a class: no class has one
 //   CMPI_RC_ERR_INVALID_PARAMETER   a parameter that is missing, unknown, given twice or of
 //                                   another kind, or a value that does not fit; it is named
-//   CMPI_RC_ERR_INVALID_CLASS       a key without name, of a class that is not known
+//   CMPI_RC_ERR_INVALID_CLASS       a key without name, or a method, of a class that is not known
 Operation readOperation(const Message& message, const Repository& classes);
 
 } // namespace Host::CimXml

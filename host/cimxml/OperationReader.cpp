@@ -197,8 +197,9 @@ private:
 };
 
 // No class has a method that can be called: neither the path's keys nor the arguments are read.
-[[noreturn]] void refuseMethod(const Message& message, const PathReader& paths)
+[[noreturn]] void refuseMethod(const Message& message, const Repository& classes)
 {
+    const PathReader paths(classes);
     const Element& path = message.path();
     std::string className;
     for (const Element& part : path.children({"LOCALNAMESPACEPATH", "INSTANCENAME", "CLASSNAME"}))
@@ -206,7 +207,9 @@ private:
             className = paths.className(part, message.nameSpace());
     if (className.empty())
         path.fail("it names no class");
-    throw Refusal(CMPI_RC_ERR_NOT_SUPPORTED,
+    if (classes.findClass(message.nameSpace(), className) == nullptr)
+        throw Refusal(CMPI_RC_ERR_INVALID_CLASS, "there is no class " + quotation(className));
+    throw Refusal(CMPI_RC_ERR_METHOD_NOT_AVAILABLE,
         "class " + className + " offers no method " + message.methodName());
 }
 
@@ -223,7 +226,7 @@ Operation readOperation(const Message& message, const Repository& classes)
         throw Refusal(CMPI_RC_ERR_INVALID_NAMESPACE,
             "there is no namespace " + quotation(message.nameSpace()));
     if (!message.isIntrinsic())
-        refuseMethod(message, PathReader(classes));
+        refuseMethod(message, classes);
     Operation operation;
     operation.kind = form->kind;
     operation.nameSpace = nameSpace->name();

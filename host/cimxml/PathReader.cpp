@@ -71,7 +71,7 @@ std::string nameSpaceOf(const Element& localNameSpacePath)
     return all;
 }
 
-const ObjectPath& PathReader::instanceName(const Element& element, std::string_view nameSpace) const
+ObjectPath& PathReader::instanceName(const Element& element, std::string_view nameSpace) const
 {
     return instance(element, nameSpace, 1);
 }

@@ -31,7 +31,7 @@ public:
     explicit PathReader(const Repository& classes) : classes_(classes) {}
 
     // Reads an INSTANCENAME in the namespace.
-    const ObjectPath& instanceName(const Element& element, std::string_view nameSpace) const;
+    ObjectPath& instanceName(const Element& element, std::string_view nameSpace) const;
     // Returns the class that a CLASSNAME or an INSTANCENAME names, spelled as it is declared.
     std::string className(const Element& element, std::string_view nameSpace) const;
 

@@ -83,6 +83,12 @@ std::optional<Continuation> Dispatcher::run(
     }
 }
 
+void Dispatcher::addHost(ObjectPath* source) const
+{
+    if (source != nullptr && source->host().empty())
+        source->setHost(hostName_().c_str());
+}
+
 void Dispatcher::runToTheEnd(const Operation& operation, Request& request, FoundObjects& found)
 {
     switch (operation.kind) {
@@ -104,9 +110,11 @@ void Dispatcher::runToTheEnd(const Operation& operation, Request& request, Found
         return associatorNames(manager_, classes_, operation, request, found);
     case Kind::references:
     case Kind::openReferenceInstances:
+        addHost(operation.path);
         return references(manager_, classes_, operation, request, found);
     case Kind::referenceNames:
     case Kind::openReferenceInstancePaths:
+        addHost(operation.path);
         return referenceNames(manager_, classes_, operation, request, found);
     case Kind::getClass:
         return getClass(classes_, operation, found);

@@ -37,6 +37,9 @@ private:
         const CimXml::Message& message, const CimXml::Caller& caller);
     std::optional<Continuation> run(CimXml::Operation& operation, Request& request,
         const std::string& principal, FoundObjects& found);
+    // Gives the source of an association the host's name, which the far end has: providers return
+    // the source as the near end.
+    void addHost(ObjectPath* source) const;
     void runToTheEnd(const CimXml::Operation& operation, Request& request, FoundObjects& found);
 
     const Repository& classes_;

@@ -77,9 +77,11 @@ ObjectSelection effectiveSelection(const Operation& operation, const Repository&
     ObjectSelection selection = operation.selection;
     if (!isOfClasses(operation.kind))
         selection.localOnly = false;
-    if (selection.properties)
+    if (selection.properties) {
         selection.properties =
             spelledAsDeclared(*classes.findNamespace(operation.nameSpace), *selection.properties);
+        selection.writesNulls = true;
+    }
     if (leavesOutSubclasses(operation)) {
         const auto* const declared = classes.findClass(operation.nameSpace, operation.className);
         // Without subclasses there is nothing to leave out.

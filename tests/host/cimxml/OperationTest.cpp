@@ -188,11 +188,10 @@ TEST_F(OperationTest, RefusesMethodsOfClassesWithoutReadingTheirArguments)
         return method("<LOCALCLASSPATH>" + where + name + "</LOCALCLASSPATH>");
     };
     EXPECT_EQ(refusalOf(method("<LOCALINSTANCEPATH>" + where + thing() + "</LOCALINSTANCEPATH>")),
-        "7 class Thing offers no method Reset");
+        "16 class Thing offers no method Reset");
     EXPECT_EQ(
-        refusalOf(onClass("<CLASSNAME NAME='thing'/>")), "7 class Thing offers no method Reset");
-    EXPECT_EQ(
-        refusalOf(onClass("<CLASSNAME NAME='Other'/>")), "7 class Other offers no method Reset");
+        refusalOf(onClass("<CLASSNAME NAME='thing'/>")), "16 class Thing offers no method Reset");
+    EXPECT_EQ(refusalOf(onClass("<CLASSNAME NAME='Other'/>")), "5 there is no class \"Other\"");
     EXPECT_THAT(refusalOf(method("")), StartsWith("request-not-loosely-valid "));
     EXPECT_THAT(refusalOf(onClass("")), StartsWith("request-not-loosely-valid "));
 }

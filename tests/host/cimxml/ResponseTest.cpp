@@ -307,6 +307,22 @@ TEST_F(ResponseTest, TakesFromTheClassWhatAValueDoesNotSay)
         R"(CLASSORIGIN="Thing" PROPAGATED="true"></PROPERTY.ARRAY></INSTANCE>)");
 }
 
+TEST_F(ResponseTest, WritesANullForAListedPropertyThatTheInstanceLacks)
+{
+    const auto& declared = Testing::classNamed(*repository, "Gauge");
+    Host::Instance& made = emptyInstance("Gauge");
+    made.setProperty("Percent", Value::integer(CMPI_uint8, 7));
+    Host::CimXml::ObjectSelection selection;
+    selection.properties = {"percent", "LEVELS", "Unknown"};
+    const std::string begin = R"(<INSTANCE CLASSNAME="Gauge"><PROPERTY NAME="Percent" )"
+                              R"(TYPE="uint8"><VALUE>7</VALUE></PROPERTY>)";
+    EXPECT_EQ(instanceXml(made, &declared, selection), begin + "</INSTANCE>");
+    selection.writesNulls = true;
+    EXPECT_EQ(instanceXml(made, &declared, selection),
+        begin + R"(<PROPERTY.ARRAY NAME="Levels" TYPE="sint32"></PROPERTY.ARRAY></INSTANCE>)");
+    EXPECT_EQ(instanceXml(made, nullptr, selection), begin + "</INSTANCE>");
+}
+
 TEST_F(ResponseTest, WritesReferencesWithWhatTheyKnow)
 {
     Host::Instance& made = emptyInstance("Link");

@@ -99,14 +99,14 @@ TEST_F(DispatcherFaultTest, NothingIsReadOfOperationsThatChangeSomethingOrQuery)
             "7: operation &quot;" + operation + "&quot; is not offered");
 }
 
-TEST_F(DispatcherFaultTest, AMethodOfAClassIsNotSupported)
+TEST_F(DispatcherFaultTest, AMethodOfAClassIsNotAvailable)
 {
     EXPECT_EQ(errorIn(answerTo(*manager_,
                   CimXmlTests::withHead(
                       "<SIMPLEREQ><METHODCALL NAME=\"Reset\"><LOCALCLASSPATH><LOCALNAMESPACEPATH>"
                       "<NAMESPACE NAME=\"root\"/><NAMESPACE NAME=\"test\"/></LOCALNAMESPACEPATH>"
                       "<CLASSNAME NAME=\"thing\"/></LOCALCLASSPATH></METHODCALL></SIMPLEREQ>"))),
-        "7: class Thing offers no method Reset");
+        "16: class Thing offers no method Reset");
 }
 
 TEST_F(DispatcherFaultTest, AnElementThatLacksSomethingIsNoAnswer)
