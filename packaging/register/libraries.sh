@@ -1,9 +1,11 @@
 # Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 # shellcheck shell=bash disable=SC2154
 
-# The provider libraries where the object manager looks for them. Sourced by
-# sensor-profile-register.
+# Links the provider libraries into the folder in which the object manager looks for them. Sourced
+# by sensor-profile-register.
 
+# Sets `used_folder` to the folder that was named, to the first existing one of those that the object
+# manager may have, or to that of the libraries.
 choose_provider_folder() {
   local folder
   is_folder_known=true
@@ -22,8 +24,8 @@ is_same_folder() { [ "$(readlink -f "$1")" = "$(readlink -f "$2")" ]; }
 
 is_our_link() { [ -L "$1" ] && [ "$(readlink "$1")" = "$library_folder/${1##*/}" ]; }
 
-# Until 0.2 the computer system's library had this name. Packages link it to the one of today when
-# they are upgraded.
+# Until 0.2 the library of the computer system had this name. An upgrade of the Debian package links
+# it to the present one.
 former_library=libComputerSystemProvider.so
 
 has_former_link() {
@@ -35,6 +37,7 @@ unlink_former_library() {
   if has_former_link; then step rm "$used_folder/$former_library"; fi
 }
 
+# Returns whether the file exists and was not linked by this command.
 is_foreign() { { [ -e "$1" ] || [ -L "$1" ]; } && ! is_our_link "$1"; }
 
 link_libraries() {

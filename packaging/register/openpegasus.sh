@@ -1,14 +1,14 @@
 # Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 # shellcheck shell=bash disable=SC2034,SC2154
 
-# Registering in OpenPegasus. Sourced by sensor-profile-register.
+# Registers in OpenPegasus. Sourced by sensor-profile-register.
 
-# Where packages of it look for provider libraries.
+# Prints the provider folders of its packages.
 provider_folders() { printf '%s\n' /usr/lib64/Pegasus/providers /usr/lib/Pegasus/providers; }
 
 modules=(SensorProfileModule SensorProfileComputerSystemModule)
 
-# Sets `registered` to those of our modules that are registered with OpenPegasus.
+# Sets `registered` to those of our modules that OpenPegasus lists.
 find_registered_modules() {
   local list each options=(--namespace NAMESPACE)
   list=$(cimprovider -l) ||
@@ -50,7 +50,7 @@ openpegasus_register() {
 }
 
 openpegasus_remove() {
-  # What is listed does not say in which namespace it is.
+  # OpenPegasus lists modules without their namespaces.
   [ -z "$namespace" ] ||
     refuse_usage "--namespace: remove takes everything from OpenPegasus," \
       "in whichever namespace it is"

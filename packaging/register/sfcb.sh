@@ -1,19 +1,20 @@
 # Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 # shellcheck shell=bash disable=SC2034,SC2154
 
-# Registering in sfcb. It keeps what is staged below one folder: registration files in regs,
-# classes in mofs/NAMESPACE. Its configuration names the registration folder, in which sfcbrepos
-# builds the repository from them, and the staging folder lies beside that. Sourced by
+# Registers in sfcb. Its staging folder has registration files in regs and classes in
+# mofs/NAMESPACE, from which sfcbrepos builds the repository in the registration folder. The
+# configuration names the registration folder; the staging folder is beside it. Sourced by
 # sensor-profile-register.
 
 registration_name=sensor-profile.reg
 class_names=(sensor-profile-computer-system.mof sensor-profile.mof)
-# What a removal found.
+# Whether a removal found anything.
 was_registered=false
 
 # ---- The folders
 
-# The configuration that was named, or the one of the installation that sfcbrepos belongs to.
+# Prints the name of the configuration: the one that was given, or that of the installation which
+# sfcbrepos belongs to.
 configuration_file() {
   local prefix
   prefix=$(dirname "$(dirname "$(command -v sfcbrepos)")")
@@ -21,15 +22,15 @@ configuration_file() {
   printf '%s' "${configuration:-$prefix/etc/sfcb/sfcb.cfg}"
 }
 
-# The value of a setting; nothing where it is not configured.
+# Prints the value of a setting, or nothing where it is not configured.
 configured() {
   local file
   file=$(configuration_file)
   [ ! -r "$file" ] || sed -n "s/^[[:blank:]]*$1:[[:blank:]]*\([^[:blank:]].*\)/\1/p" "$file" | tail -n 1
 }
 
-# Where it looks for provider libraries, the best place first: the folder of ours, or the last one,
-# since the first ones have those of sfcb itself.
+# Prints the provider folders, the preferred one first: that of our libraries, or the last, since
+# the first ones have the libraries of sfcb itself.
 provider_folders() {
   local each folders
   if ! read -ra folders < <(configured providerDirs); then
@@ -42,7 +43,8 @@ provider_folders() {
   printf '%s\n' "${folders[@]}" | tac
 }
 
-# Sets `stage`, and `repository_options`, by which sfcbrepos finds the folders.
+# Sets `stage` to the staging folder and `repository_options` to the options that name the
+# registration folder.
 find_stage() {
   local folder
   stage=/var/lib/sfcb/stage
@@ -58,7 +60,7 @@ find_stage() {
   refuse_unreadable_stage
 }
 
-# What lies in a folder that cannot be looked into would pass for not being staged.
+# Files in a folder that cannot be read would be taken for not staged.
 refuse_unreadable_stage() {
   local folder
   folder=$(find "$stage" -type d \( ! -readable -o ! -executable \) -print -quit 2>/dev/null) ||
@@ -66,10 +68,10 @@ refuse_unreadable_stage() {
   [ -z "$folder" ] || refuse "$folder cannot be read"
 }
 
-# ---- What is staged
+# ---- Staged files
 
-# Sets `registered_in` to the namespace that our staged registration file names; empty when there is
-# none.
+# Sets `registered_in` to the namespace in our staged registration file, or to nothing where there is
+# no such file.
 find_registration() {
   local file=$stage/regs/$registration_name options=()
   registered_in=''
@@ -79,14 +81,14 @@ find_registration() {
   earlier_command=$(command_to register --namespace "$registered_in" "${options[@]}")
 }
 
-# The namespaces that have classes of ours staged.
+# Prints the namespaces in which our classes are staged.
 staged_namespaces() {
   [ -d "$stage/mofs" ] || return 0
   find "$stage/mofs" \( -name "${class_names[0]}" -o -name "${class_names[1]}" \) \
     -printf '%P\n' | sed 's|/[^/]*$||' | sort --unique
 }
 
-# Classes staged in this namespace, or all.
+# Prints the files of our classes that are staged in the given namespace, or in all.
 staged_classes() {
   local each
   if [ $# -gt 0 ]; then
@@ -98,7 +100,8 @@ staged_classes() {
   fi
 }
 
-# Those that the registration leaves behind: of other namespaces, and the computer system's.
+# Prints the staged files that the new registration does not have: those of other namespaces, and the
+# class of a computer system that is not registered.
 outdated_classes() {
   local each
   for each in $(staged_namespaces); do
@@ -107,16 +110,16 @@ outdated_classes() {
   "$with_computer_system" || existing "$stage/mofs/$namespace/${class_names[0]}"
 }
 
-# What a removal takes away: of one namespace, or everything.
+# Prints the staged files that a removal deletes.
 staged_files() {
   staged_classes ${namespace:+"$namespace"}
   "$keeps_registration" || existing "$stage/regs/$registration_name"
 }
 
-# ---- Changing it
+# ---- Changes
 
-# A failure of sfcbrepos leaves sfcb without classes. Hence all is tried in a copy first: the
-# functions below run each command through the one that is given, attempt or step.
+# A failure of sfcbrepos leaves sfcb without classes. Therefore each change is attempted in a copy
+# first: the functions here run their commands through the given one, `attempt` or `step`.
 
 build_repository() { "$1" sfcbrepos -s "$stage" "${repository_options[@]}" -f; }
 
@@ -135,7 +138,7 @@ unstage_providers() {
   local staged
   mapfile -t staged < <(staged_files)
   [ ${#staged[@]} -eq 0 ] || "$1" rm "${staged[@]}"
-  # Even if nothing was staged: an earlier attempt may have failed here.
+  # Where nothing is staged, an earlier removal may have failed in this step.
   build_repository "$1"
 }
 
@@ -147,8 +150,8 @@ attempt() {
   refuse "tried in a copy of $original, $1 failed with exit code $status"
 }
 
-# Runs the function in a copy of the staging folder, and of the repository, whose instances
-# sfcbrepos carries over.
+# Runs the function in copies of the staging folder and of the registration folder, from which
+# sfcbrepos takes over instances.
 try_in_copy() {
   local original=$stage repository=${repository_options[1]-}
   local stage=$work/stage repository_options=(-r "$work/registration")

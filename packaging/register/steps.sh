@@ -1,14 +1,14 @@
 # Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 # shellcheck shell=bash disable=SC2034,SC2154
 
-# Doing things one step at a time, and telling what was done when one of them fails. Sourced by
+# Runs the commands that change something and reports which were done when one fails. Sourced by
 # sensor-profile-register.
 
 steps_done=()
-# What restores the registration that was found; empty when there was none.
+# The command that restores the registration which was found; empty when there was none.
 earlier_command=''
 
-# The words as they can be typed, in quotation marks only where they need them.
+# Prints the words as a shell reads them, quoted only where necessary.
 quoted() {
   local word line=()
   for word; do
@@ -18,8 +18,8 @@ quoted() {
   printf '%s' "${line[*]}"
 }
 
-# command_to ACTION [OPTION]...: the command that does it with the same object manager and folders,
-# to be typed.
+# command_to ACTION [OPTION]...: prints the command for the action with the same object manager and
+# folders.
 command_to() {
   local words=("$own_command" "$1" --object-manager "$object_manager" "${@:2}")
   [ -z "$provider_folder" ] || words+=(--provider-folder "$provider_folder")
@@ -30,15 +30,15 @@ command_to() {
   quoted "${words[@]}"
 }
 
-# Something is not as it must be, and no step was taken yet.
+# Exits with a message before the first step.
 refuse() {
   complain "$@"
   echo "Nothing was changed." >&2
   exit 1
 }
 
-# The step that failed, those before it, and the way back: to the registration that was found, or to
-# none.
+# Exits with a message that names the step that failed, those before it, and the command that undoes
+# them: it restores the registration which was found, or removes the new one.
 report_failure() {
   local undo
   complain "$1"
@@ -55,7 +55,7 @@ report_failure() {
   exit 1
 }
 
-# A signal came. A second one is not held up.
+# Ends the running step after a signal. A second signal has its default effect.
 end_interrupted_step() {
   trap - INT TERM HUP
   [ -z "$running_step" ] || kill "$running_step" 2>/dev/null || true
@@ -63,8 +63,8 @@ end_interrupted_step() {
   report_failure "interrupted: $1"
 }
 
-# Prints a command that changes something and runs it; when it fails, nothing after it is done. It
-# runs beside the shell, which would put off a signal until it ends.
+# Prints a command and runs it; exits when it fails. The command runs in the background, since the
+# shell defers a trap until a command in the foreground ends.
 step() {
   local line status=0 running_step=''
   line=$(quoted "$@")
@@ -79,7 +79,7 @@ step() {
   steps_done+=("$line")
 }
 
-# Of these files, those there are.
+# Prints those of the given files that exist.
 existing() {
   local each
   for each in "$@"; do
@@ -87,11 +87,9 @@ existing() {
   done
 }
 
-# ---- Documents
-
-# document NAME MARKED: sets `registration` to a registration document. Where the options ask for
-# another than the one that is shipped, it is made in the folder that the commands run in, by a
-# command that is printed as they are. MARKED are sed's addresses of the computer system's part.
+# document NAME ADDRESSES: sets `registration` to the registration document. One that the options
+# change is made in the current folder, by a command that is printed as steps are. ADDRESSES are
+# those of the computer system's part for sed.
 document() {
   local shipped=$share/registration/$1 changes=()
   [ "$namespace" = "$shipped_namespace" ] ||

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Registering in OpenPegasus.
+// Tests of registering in OpenPegasus.
 
 #include "tests/packaging/RegisterTest.h"
 
@@ -22,7 +22,7 @@ protected:
 
     Lines modules() const { return linesOf(contentOf(path("modules"))); }
 
-    // The line that declares a class, as it was compiled last.
+    // Returns the line that declares a class in the source that was compiled last.
     std::string definition(const std::string& name) const
     {
         return contentOf(path("classes/root/cimv2/" + name));
@@ -76,7 +76,7 @@ TEST_F(OpenPegasusTest, RemovesTheProviders)
     EXPECT_THAT(modules(), IsEmpty());
 }
 
-// It cannot be seen which namespace is registered: what somebody takes for the old one may be new.
+// OpenPegasus does not list the namespace, so that the removal might take the wrong registration.
 TEST_F(OpenPegasusTest, RemovesFromNoSingleNamespace)
 {
     mustRun({"register", "--namespace", "root/old"});
@@ -161,7 +161,7 @@ TEST_F(OpenPegasusTest, RegistersTheSensorsWithoutTheComputerSystem)
             Not(HasSubstr("ComputerSystemProvider")), testing::EndsWith("};\n\n")));
 }
 
-// An association refers to it.
+// An association refers to the class.
 TEST_F(OpenPegasusTest, TheComputerSystemsClassIsAddedWhereItIsMissing)
 {
     mustRun({"register", "--without-computer-system"});
@@ -205,7 +205,7 @@ TEST_F(OpenPegasusTest, DryRunPrintsTheStepsAndTakesNone)
     EXPECT_EQ(links().size(), 2U);
 }
 
-// Where the machine has a folder of providers for it, they are linked there.
+// The libraries are linked into the machine's provider folder of OpenPegasus if it exists.
 TEST_F(OpenPegasusTest, WithoutAFolderTheMachinesIsTaken)
 {
     std::string expected = "must look for provider libraries in " + library();
@@ -244,7 +244,7 @@ TEST_P(EveryFirstStepOfOpenPegasusTest, CanFailAndBeUndone)
 
 INSTANTIATE_TEST_SUITE_P(Steps, EveryFirstStepOfOpenPegasusTest, testing::Range<std::size_t>(0, 5));
 
-// What was registered before is not to be removed.
+// The advice restores the earlier registration instead of removing it.
 class EveryRepeatedStepOfOpenPegasusTest : public EveryStepOf<OpenPegasusTest> {};
 
 TEST_P(EveryRepeatedStepOfOpenPegasusTest, CanFailAndLeadBack)
@@ -301,7 +301,7 @@ TEST_F(OpenPegasusTest, AnUndoneRemovalIsARegistrationAsItWas)
                              "--namespace NAMESPACE --without-computer-system --provider-folder "));
 }
 
-// A command that hangs is ended, too.
+// The signal also ends a command that hangs.
 TEST_F(OpenPegasusTest, ASignalDuringAStepIsAFailureOfIt)
 {
     folder_.write("hang-at", "2");
@@ -322,7 +322,7 @@ TEST_F(OpenPegasusTest, ASignalDuringAStepIsAFailureOfIt)
     }
 }
 
-// Where the name alone leads to it, that is how it is told to be typed.
+// The advice names the command without its folder when PATH leads to it.
 TEST_F(OpenPegasusTest, AdviceNamesTheCommandAsItIsFound)
 {
     fs::create_symlink(program_, path("bin/sensor-profile-register"));

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// How sensor-profile-register chooses the object manager, and what it refuses.
+// Tests of how sensor-profile-register chooses the object manager and which options it refuses.
 
 #include "tests/packaging/RegisterTest.h"
 

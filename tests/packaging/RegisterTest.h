@@ -1,7 +1,7 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// sensor-profile-register, run from an installation, with stand-ins for the commands of the
-// object managers, which record how they are called.
+// Fixtures that run sensor-profile-register from an installation, with stand-ins for the commands
+// of the object managers, which record their calls.
 
 #pragma once
 
@@ -22,7 +22,7 @@ class RegisterTest : public ::testing::Test {
 protected:
     using Lines = std::vector<std::string>;
 
-    // The stand-ins of these commands are all there is of object managers.
+    // No other commands of object managers than these are found.
     explicit RegisterTest(const Lines& commands)
     {
         for (const char* const name : {"providers", "stage", "CIM"})
@@ -40,7 +40,7 @@ protected:
             SENSOR_PROFILE_SOURCE_DIR "/tests/packaging/stand-in", path("bin/" + command));
     }
 
-    // With the stand-ins; the first word is a command.
+    // Runs the command with the stand-ins in PATH.
     Ended runWords(const Lines& words) const
     {
         return run({words.begin() + 1, words.end()},
@@ -49,14 +49,14 @@ protected:
                     {"STAND_IN", folder_.path().string()}}});
     }
 
-    // With the folders that the machine has, unless the arguments name others.
+    // Runs it with the folders of the machine unless the arguments name others.
     Ended runAsTyped(Lines arguments) const
     {
         arguments.insert(arguments.begin(), program_);
         return runWords(arguments);
     }
 
-    // With folders of the test's own: the machine may have object managers.
+    // Runs it with folders of the test's own, since the machine may have object managers.
     Ended runRegister(Lines arguments) const
     {
         arguments.insert(arguments.begin(),
@@ -67,14 +67,14 @@ protected:
     // Runs it and expects it to succeed.
     std::string mustRun(const Lines& arguments) const { return succeeding(runRegister(arguments)); }
 
-    // What would be done with the machine's folders.
+    // Returns the output of a dry run with the folders of the machine.
     std::string plan(Lines arguments) const
     {
         arguments.emplace_back("--dry-run");
         return succeeding(runAsTyped(arguments));
     }
 
-    // Runs the command that a message names between two texts.
+    // Runs the command that is between two texts in a message, and expects it to succeed.
     void mustRunAdvice(
         const std::string& message, const std::string& before, const std::string& after) const
     {
@@ -87,7 +87,7 @@ protected:
         succeeding(runAsTyped(words));
     }
 
-    // How the stand-ins were called since the last time this was asked.
+    // Returns and forgets the calls of the stand-ins.
     Lines calls() const
     {
         Lines lines = linesOf(contentOf(path("calls")));
@@ -95,7 +95,7 @@ protected:
         return lines;
     }
 
-    // Of the calls from now on, the one with this number fails.
+    // Makes the stand-in with this number among the following calls fail.
     void failAt(std::size_t number) const { folder_.write("fail-at", std::to_string(number)); }
     void failNoMore() const { std::filesystem::remove(path("fail-at")); }
 
@@ -113,15 +113,14 @@ protected:
         return "rm " + path("providers/" + name);
     }
 
-    // Puts the link there that a registration of 0.2 made, which an upgrade leaves without a
-    // target.
+    // Makes the link of a registration by 0.2, whose target an upgrade deletes.
     void addFormerLink() const
     {
         std::filesystem::create_symlink(library("libComputerSystemProvider.so"),
             path("providers/libComputerSystemProvider.so"));
     }
 
-    // What a message begins with when the step after so many done ones fails.
+    // Returns the beginning of the message when the step after the first `done` ones fails.
     static std::string failureAt(std::size_t done, const Lines& steps)
     {
         std::string message =
@@ -132,7 +131,7 @@ protected:
         return message + "To undo it: ";
     }
 
-    // The folder of the libraries, or one of them.
+    // Returns the path of an installed library, or of the folder of libraries.
     static std::string library(const std::string& name = "")
     {
         return installedFile("lib/cmpi" + (name.empty() ? "" : "/" + name));
@@ -157,8 +156,7 @@ private:
     }
 };
 
-// Whichever step fails, the message lists the steps before it, and the command that it names leads
-// back to what was before.
+// A fixture in which the step of the parameter fails.
 template <typename ObjectManager>
 class EveryStepOf : public ObjectManager, public ::testing::WithParamInterface<std::size_t> {
 protected:
@@ -170,7 +168,8 @@ protected:
         this->addCommand("rm");
     }
 
-    // Runs what fails at the parameter's step, after so many calls that are no steps.
+    // Runs it and expects a message that lists the steps before the failure. `callsBefore` is the
+    // number of the stand-ins' calls before the first step.
     std::string failing(std::size_t callsBefore, const Lines& arguments, const Lines& steps)
     {
         const std::size_t done = this->GetParam();

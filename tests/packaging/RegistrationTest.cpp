@@ -1,7 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The registration documents against the table by which the embedded object manager finds its
-// providers.
+// Compares the registration documents with the table of the embedded object manager.
 
 #include "host/manager/SensorProfile.h"
 #include "tests/tools/ToolTest.h"
@@ -48,7 +47,7 @@ std::vector<Registration> embeddedTable()
 
 using Properties = std::map<std::string, std::string>;
 
-// The instances of a MOF document by class; values as they are written, without quotes.
+// Returns the instances in a MOF document by class, with values as written but without quotes.
 std::multimap<std::string, Properties> readInstances(const std::string& text)
 {
     static const std::regex head(R"(instance of (\w+) \{)");
@@ -145,7 +144,7 @@ std::vector<std::string> matches(const std::string& text, const char* pattern)
     return {std::sregex_token_iterator(text.begin(), text.end(), group, 1), {}};
 }
 
-// OpenPegasus replaces a class only by one of a higher version.
+// OpenPegasus replaces a class only by one of another version.
 TEST(RegisteredClassesTest, HaveTheVersionOfTheProduct)
 {
     for (const std::string name : {"sensor-profile.mof", "sensor-profile-computer-system.mof"}) {

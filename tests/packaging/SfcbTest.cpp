@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Registering in sfcb.
+// Tests of registering in sfcb.
 
 #include "tests/packaging/RegisterTest.h"
 #include "tests/support/Requirement.h"
@@ -24,7 +24,7 @@ class SfcbTest : public RegisterTest {
 protected:
     SfcbTest() : RegisterTest({"sfcbstage", "sfcbrepos"}) {}
 
-    // What is staged beside sfcb's own.
+    // Returns the staged files except sfcb's own.
     Lines stage() const
     {
         Lines files = filesBelow(path("stage"));
@@ -32,7 +32,7 @@ protected:
         return files;
     }
 
-    // The calls that change something: what comes before is tried in a copy.
+    // Returns the calls that change the staging folder; others work on a copy of it.
     Lines steps() const
     {
         Lines all = calls();
@@ -96,7 +96,7 @@ protected:
         folder_.write("own/stage/default.reg", "");
     }
 
-    // With folders that the configuration may have commented out.
+    // Writes a configuration with a comment, blanks and a provider folder that does not exist.
     void configure(const std::string& file, const std::string& registration) const
     {
         folder_.write(file, "##  Locations\n#registrationDir: /none\nregistrationDir: " +
@@ -156,7 +156,7 @@ TEST_F(ConfiguredSfcbTest, LinksNothingWhereItLooksInTheFolderOfTheLibraries)
         Not(AnyOf(HasSubstr("ln -s"), HasSubstr("must look"))));
 }
 
-// Files that are staged beside ours, such as classes that the CIM schema has, too.
+// Somebody staged classes that the CIM schema has, too.
 TEST_F(SfcbTest, ChangesNothingWhenTheRepositoryCannotBeBuilt)
 {
     for (const std::string before : {"nothing", "register"}) {
@@ -215,7 +215,7 @@ TEST_F(SfcbTest, RemovesLinksThatAreLeftOfIt)
     EXPECT_THAT(links(), IsEmpty());
 }
 
-// An upgrade of the package put it into the folder of the libraries.
+// An upgrade of the package made the link in the folder of the libraries.
 TEST_F(SfcbTest, RemovesTheLinkOfTheLibrarysFormerName)
 {
     const std::string former = library("libComputerSystemProvider.so");
@@ -228,7 +228,8 @@ TEST_F(SfcbTest, RemovesTheLinkOfTheLibrarysFormerName)
     EXPECT_THAT(filesBelow(library()), ElementsAre(systemLibrary_, sensorLibrary_));
 }
 
-// As somebody to whom permissions apply: root without the right to pass them over.
+// The command runs as a user to whom permissions apply: root without the capabilities to override
+// them.
 TEST_F(SfcbTest, RefusesAStageThatCannotBeLookedInto)
 {
     mustRun({"register"});
@@ -269,7 +270,7 @@ TEST_F(SfcbTest, RegistersWithoutTheComputerSystem)
         Not(HasSubstr("class ZUMLO_ComputerSystem")));
     const Lines shipped = linesOf(contentOf(shared("registration/sensor-profile.reg")));
     EXPECT_EQ(linesOf(stagedRegistration()),
-        Lines(shipped.begin(), shipped.end() - 6)); // but for the block of the computer system
+        Lines(shipped.begin(), shipped.end() - 6)); // without the block of the computer system
     EXPECT_THAT(links(), ElementsAre("libSensorProfileProvider.so"));
 }
 
@@ -304,7 +305,7 @@ TEST_F(SfcbTest, RemovingFromANamespaceLeavesTheRegistrationOfAnother)
     EXPECT_EQ(stagedRegistration(), registration);
     EXPECT_EQ(links().size(), 2U);
 
-    // Classes that stand there nevertheless.
+    // Classes in the namespace without a registration are removed.
     fs::create_directories(path("stage/mofs/root/a"));
     folder_.write("stage/mofs/root/a/sensor-profile.mof", "");
     mustRun({"remove", "--namespace", "root/a"});
@@ -339,7 +340,7 @@ TEST_F(SfcbTest, DryRunPrintsTheStepsAndTakesNone)
     EXPECT_EQ(links().size(), 2U);
 }
 
-// Whoever types what a dry run prints gets what the run itself does.
+// Typing the printed commands has the effect of the run itself.
 TEST_F(SfcbTest, DryRunCanBeFollowed)
 {
     const Lines options = {"register", "--namespace", "root/s", "--without-computer-system"};
