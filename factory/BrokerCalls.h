@@ -1,8 +1,8 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Calls to the broker, with their results tested: an object that is null or has no handle is
-// returned as null. Objects belong to the broker. A `CMPIStatus*` is passed on to the broker and
-// may be null.
+// Calls of the broker that test their results: an object that is null or has no handle is returned
+// as null. Objects belong to the broker. A `CMPIStatus*` is passed on to the broker and may be
+// null.
 
 #pragma once
 
@@ -11,7 +11,7 @@
 
 namespace Vorn::SensorProfileProvider {
 
-// Returns whether the object is neither null nor without a handle.
+// Returns whether the object is not null and has a handle.
 template <typename Object>
 bool isUsable(const Object* object)
 {

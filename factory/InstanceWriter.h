@@ -12,8 +12,8 @@
 namespace Vorn::SensorProfileProvider {
 
 // Sets properties of one instance, each with its CMPI type. An object manager may copy a whole
-// CMPIValue from the address it is passed, whatever the type: all but texts are such values. The
-// status of a setting is ignored: a property that the broker refuses is absent.
+// CMPIValue from the address that it is passed, whatever the type: all values but texts are whole.
+// The status of a setting is ignored: a property that the broker refuses is absent.
 class InstanceWriter {
 public:
     // REQUIRES: the instance is usable and outlives the writer.
@@ -31,8 +31,8 @@ public:
     // no array. `rc` is passed on to the broker.
     bool setCodes(const char* name, const std::vector<std::uint16_t>& codes, CMPIStatus* rc) const;
 
-    // As setCodes(). An element stays empty when the broker cannot make its string.
-    // REQUIRES: rc is not null.
+    // Sets an array of texts as setCodes() does one of codes. An element stays empty when the
+    // broker cannot make its string. REQUIRES: rc is not null.
     bool setTexts(const char* name, const std::vector<std::string>& texts, CMPIStatus* rc) const;
 
 private:

@@ -58,14 +58,15 @@ public:
     int getAllSensorCMPIObjPaths(const CMPIBroker* broker, const CMPIObjectPath* ref,
         std::vector<CMPIObjectPath*>& objectPaths, CMPIStatus* status);
 
-    // Returns an instance of ZUMLO_SensorEnabledLogicalElementCapabilities, or null (or an
-    // instance without a handle) when the broker made none. A property whose array cannot be made
-    // is omitted, with the failure in rc, which may be null. `isObjPath` as above.
+    // Returns an instance of ZUMLO_SensorEnabledLogicalElementCapabilities, or null (or an instance
+    // without a handle) when the broker made none. A property whose array cannot be made is
+    // omitted, with the failure in rc, which may be null. `isObjPath` selects the keys alone and
+    // matters only without a property list.
     CMPIInstance* makeSensorEnabledLogicalElementCapInstance(const CMPIBroker* broker,
         const CMPIObjectPath* ref, SensorEnabledLogCap snsrCap, const char** properties,
         bool isObjPath, CMPIStatus* rc);
 
-    // As for sensors, ordered by instance identifier.
+    // These do the same for capabilities, ordered by instance identifier.
     int getAllSensorEnabledLogicalElementCapCMPIInstances(const CMPIBroker* broker,
         const CMPIObjectPath* ref, const char** properties, bool isObjPath,
         std::vector<CMPIInstance*>& instances, CMPIStatus* rc);
@@ -93,7 +94,8 @@ private:
     void _createSensorMap();
     void _createEnabledLogicalElementCapMap();
 
-    // In harvest order, duplicates included. The maps take over the content of the records.
+    // The records in the order of the harvest, with duplicates. The maps take over the content of
+    // the records.
     std::vector<Sensor> vectSensor;
     std::vector<SensorEnabledLogCap> vectSensorEnabledLogCap;
     std::map<std::string, Sensor> sensorMap; // by device identifier; the later duplicate wins

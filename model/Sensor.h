@@ -91,7 +91,7 @@ private:
     std::uint16_t rateUnits_ = 0;
     std::uint32_t fixedStateLabels_ = 0;    // how many times they are appended
     std::uint32_t supportedThresholds_ = 0; // how many times 0 to 5 is appended
-    std::uint32_t settableThresholds_ = 0;  // the same
+    std::uint32_t settableThresholds_ = 0;  // how many times 0 to 5 is appended
     std::uint16_t sensorType_ = 0;
     std::uint16_t enabledState_ = 0;
     std::uint16_t requestedState_ = 0;

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The parts of requests that the two association providers share.
+// The common parts of the requests of the two association providers.
 
 #pragma once
 
@@ -28,7 +28,7 @@ struct Reference {
 };
 using References = std::array<Reference, 2>;
 
-// A value has no place for a path that is const; the broker copies the path.
+// A CMPIValue cannot hold a const path; the broker copies the path.
 inline Reference referenceTo(const char* role, const CMPIObjectPath* path)
 {
     return {role, {.ref = const_cast<CMPIObjectPath*>(path)}};
@@ -59,7 +59,7 @@ inline constexpr const char* capabilitiesPathsFailed =
 
 // The failure of enumerating the objects of one end, if there was one.
 struct FetchFailure {
-    const char* text; // of the message line; null when all went well
+    const char* text; // of the message line; null on success
     bool hasExitMark = true;
 };
 
@@ -184,8 +184,8 @@ inline const char* namedOrOwn(const char* assocClass, const char* own)
 void addReferenceKeys(const CMPIObjectPath* path, const References& references);
 
 // Makes an instance at the path with the references as properties. `properties` and `keys` are its
-// property filter; there is none when `keys` is null. Returns what the broker returned when that is
-// not usable.
+// property filter; there is none when `keys` is null. Returns the result of the broker even if it
+// is not usable.
 CMPIInstance* newAssociation(const CMPIBroker* broker, const CMPIObjectPath* path,
     const References& references, const char** properties, const char** keys);
 

@@ -49,7 +49,8 @@ private:
 
 inline constexpr const char* noKeyPassed = "At least one key should be passed";
 
-// In these, `status` is passed on to the broker and may be null but for textKey().
+// In the functions below, `status` is passed on to the broker and, except in textKey(), may be
+// null.
 
 // Returns the number of keys of the request's path, 0 when the path is not usable.
 CMPICount keyCountOf(const CMPIObjectPath* ref, CMPIStatus* status);

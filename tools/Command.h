@@ -14,9 +14,9 @@ class Output;
 
 enum class ExitCode {
     success = 0,
-    failure = 1,      // a message on standard error says why
+    failure = 1,      // with a message on standard error
     wrongUsage = 2,   // the command line is invalid
-    nothingFound = 3, // all went well, but there is nothing to show
+    nothingFound = 3, // success, but there is nothing to show
 };
 
 // A subclass adds its options to the parser in its constructor and reads them in run().

@@ -1,13 +1,13 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The whole tool behind main().
+// The tool as a function that main() calls.
 
 #pragma once
 
 namespace Tools {
 
-// Reads the command line, does what it says and returns the exit code of the process. Messages
-// go to standard error, what was asked for to standard output.
+// Parses and executes the command line, and returns the exit code of the process. Messages go to
+// standard error, results to standard output.
 int runTool(int argc, const char* const* argv);
 
 } // namespace Tools

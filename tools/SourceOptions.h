@@ -19,14 +19,14 @@ class SourceOptions {
 public:
     // Adds --model; the object must outlive the parser.
     void addModel(CLI::App& parser);
-    // Adds --provider; likewise.
+    // Adds --provider; the object must outlive the parser.
     void addProvider(CLI::App& parser);
 
     const std::optional<std::string>& model() const { return model_; }
 
-    // Makes this process read the model file, if one is given. Throws std::runtime_error with the
-    // file, the place in it and the reason when it is no model.
-    // REQUIRES: no provider is loaded, and there are no other threads.
+    // Selects the model file for this process, if one is given. Throws std::runtime_error with the
+    // file, the place in it and the reason when it is no model. REQUIRES: no provider is loaded,
+    // and there are no other threads.
     void selectMachine() const;
 
     // Throws std::runtime_error when no library is given and none is found.

@@ -6,7 +6,7 @@
 
 namespace Tools {
 
-// An invalid command line; the text says what is wrong with it.
+// An invalid command line; the text describes the error.
 class UsageError : public std::runtime_error {
 public:
     using std::runtime_error::runtime_error;

@@ -53,9 +53,10 @@ public:
     // request, such as the names of properties, classes and namespaces.
     const String& name(std::string_view characters);
 
-    // The arena of the request that this thread runs; null when there is none.
+    // Returns the arena of this thread's current request; null when there is none.
     static Arena* current() noexcept;
-    // The same. Throws Refusal (CMPI_RC_ERR_FAILED) when there is none.
+    // Returns the arena of this thread's current request. Throws Refusal (CMPI_RC_ERR_FAILED) when
+    // there is none.
     static Arena& required();
     // Makes an arena (or none) the current one of this thread and returns the previous one.
     static Arena* makeCurrent(Arena* arena) noexcept;

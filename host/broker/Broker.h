@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The embedded object manager's broker: what a CMPI provider gets when it is loaded.
+// The embedded object manager's broker, which CMPI providers get when they are loaded.
 
 #pragma once
 
@@ -23,8 +23,8 @@ public:
     Broker(const Broker&) = delete;
     Broker& operator=(const Broker&) = delete;
 
-    // What providers get. All function tables are complete: services that no shipped provider
-    // calls answer CMPI_RC_ERR_NOT_SUPPORTED.
+    // Returns the handle for providers. All function tables are complete: services that no shipped
+    // provider calls return CMPI_RC_ERR_NOT_SUPPORTED.
     const CMPIBroker* handle() const noexcept { return &handle_; }
     // Returns the broker behind a handle; null when there is none of this kind.
     static const Broker* of(const CMPIBroker* handle) noexcept;
@@ -32,7 +32,7 @@ public:
     // Sets the object that answers up-calls; by default there is none. REQUIRES: no request is
     // running.
     void setUpcalls(BrokerUpcalls* upcalls) noexcept { upcalls_ = upcalls; }
-    // Sets what is known about classes; null (the default) for nothing. REQUIRES: as above.
+    // Sets the class information; null (the default) for none. REQUIRES: no request is running.
     void setClassInformation(const ClassInformation* classes) noexcept { classes_ = classes; }
 
     BrokerUpcalls* upcalls() const noexcept { return upcalls_; }

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// What the broker and the manager need to know about classes.
+// The class information that the broker and the manager use.
 
 #pragma once
 
@@ -16,7 +16,7 @@ struct ReferenceProperty {
     std::string className;
 };
 
-// Asked from any thread at any time, without locks: its answers never change.
+// Immutable; any thread may call it at any time without locks.
 class ClassInformation {
 public:
     virtual ~ClassInformation() = default;
@@ -26,7 +26,7 @@ public:
     virtual const std::vector<std::string>* keysOf(
         std::string_view nameSpace, std::string_view className) const = 0;
 
-    // Whether the class is derived from the other one, at any distance.
+    // Returns whether the class is derived from the other one, at any distance.
     virtual bool isDerivedFrom(std::string_view nameSpace, std::string_view className,
         std::string_view ancestor) const = 0;
 

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// What a provider delivered in answer to a call, in order.
+// The objects that a provider delivered in a call, in order.
 
 #pragma once
 
@@ -14,14 +14,15 @@ namespace Host {
 class Instance;
 class ObjectPath;
 
-// Shows each object as it was when it was delivered. The objects live as long as the request.
+// Holds a copy of each object as it was delivered. The objects live as long as the request.
 class CollectedResult {
 public:
     const std::vector<const Instance*>& instances() const noexcept { return instances_; }
     const std::vector<const ObjectPath*>& paths() const noexcept { return paths_; }
-    // Whether the provider closed its result.
+    // Returns whether the provider closed its result.
     bool isDone() const noexcept { return isDone_; }
-    // How many deliveries were refused: of null, of objects without a handle, and after the end.
+    // Returns how many deliveries were refused: of null, of objects without a handle, and after the
+    // end.
     std::size_t refused() const noexcept { return refused_; }
 
     bool isEmpty() const noexcept { return instances_.empty() && paths_.empty(); }

@@ -6,8 +6,8 @@
 
 namespace Host {
 
-// What a provider is called with and hands back in its up-calls. It has no entries: no shipped
-// provider reads one.
+// The context that a provider gets with a call and passes to its up-calls. It has no entries, since
+// no shipped provider reads any.
 class Context : public Encapsulated<Context, CMPIContext, Object::Kind::context> {
 public:
     static const CMPIContextFT functions;

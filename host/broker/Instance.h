@@ -23,7 +23,7 @@ public:
 
     std::string_view className() const noexcept;
     const NamedValues& properties() const noexcept { return properties_; }
-    // Null when there is no such property.
+    // Returns null when there is no such property.
     const Value* property(std::string_view name) const noexcept;
 
     // Sets the property unless the filter leaves it out. The value must live as long as the
@@ -31,9 +31,8 @@ public:
     void setProperty(std::string_view name, const Value& value);
 
     // Returns a new path in this thread's arena: the one that the instance was made with, and the
-    // values that its key properties have now. Keys are those of the class where it is known, in
-    // the order of the properties, else those named in the filter; one without a value is left
-    // out.
+    // current values of its key properties. Keys are those of the class where it is known, in the
+    // order of the properties, else those named in the filter; one without a value is left out.
     ObjectPath& objectPath() const;
 
     // Returns a new instance, equal to this one. The two share their properties until one of them

@@ -7,9 +7,9 @@
 
 namespace Host {
 
-// Memory of the default resource, blocks of megabytes in huge pages where the system grants
-// them: in an answer of ten thousand instances the page faults would cost as much as what is
-// written into the pages.
+// Memory of the default resource, blocks of megabytes in huge pages where the system grants them:
+// in an answer of ten thousand instances the page faults would take as much time as writing the
+// pages.
 class LargeBlocks final : public std::pmr::memory_resource {
     void* do_allocate(std::size_t size, std::size_t alignment) override;
     void do_deallocate(void* block, std::size_t size, std::size_t alignment) override;

@@ -20,7 +20,7 @@ struct NamedValue {
     Value value;
 };
 
-// Takes memory for each change from the arena that it is given.
+// Each change takes memory from the given arena.
 class NamedValues {
 public:
     NamedValues() noexcept = default;
@@ -31,7 +31,7 @@ public:
     auto begin() const noexcept { return elements_.begin(); }
     auto end() const noexcept { return elements_.end(); }
 
-    // Without regard to letter case; null when there is none.
+    // Returns the value of that name, in any letter case; null when there is none.
     const NamedValue* find(std::string_view name) const noexcept;
 
     // Replaces the value of that name in its place, or adds one at the end. The value must

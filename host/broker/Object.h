@@ -1,7 +1,7 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// What stands behind the handles that providers hold. Each CMPI object of the broker is a C++
-// object that contains its own handle, and whose address is the handle's "hdl".
+// The objects behind the handles of providers. Each CMPI object of the broker is a C++ object that
+// contains its own handle, and whose address is the handle's "hdl".
 
 #pragma once
 
@@ -16,7 +16,7 @@ namespace Host {
 
 class Object {
 public:
-    // Distinctive numbers: a handle of another origin is not taken for one of this broker.
+    // The numbers are distinctive, so that handles of another origin are recognised.
     enum class Kind : std::uint32_t {
         broker = 0x53504200,
         string,
@@ -45,8 +45,8 @@ private:
     Kind kind_;
 };
 
-// Base of the class Self that stands behind a HandleType, such as CMPIString. Self declares
-// "static const Table functions", the handle's function table.
+// Base of the class Self that implements a HandleType, such as CMPIString. Self declares "static
+// const Table functions", the handle's function table.
 //
 // Objects live in the arena of the request that they are made in, and take memory from the
 // thread's current one when they change.

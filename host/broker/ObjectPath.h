@@ -14,7 +14,7 @@ namespace Host {
 
 class ObjectPath : public Encapsulated<ObjectPath, CMPIObjectPath, Object::Kind::objectPath> {
 public:
-    // A path without host and keys.
+    // Makes a path without host and keys.
     static ObjectPath& make(Arena& arena, std::string_view nameSpace, std::string_view className);
 
     // Empty when there is none.
@@ -22,7 +22,7 @@ public:
     std::string_view host() const noexcept;
     std::string_view className() const noexcept;
     const NamedValues& keys() const noexcept { return keys_; }
-    // Null when there is no such key.
+    // Returns null when there is no such key.
     const Value* key(std::string_view name) const noexcept;
 
     // A null text removes the namespace or host: providers then get a string object without

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// How the broker's own code says no: the slot that was called turns it into a CMPI status.
+// The exception of the broker's own code, which the called slot converts to a CMPI status.
 
 #pragma once
 

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The scope of one request: while it lasts, this thread can make CMPI objects.
+// The scope of one request, within which its thread can make CMPI objects.
 
 #pragma once
 
@@ -35,7 +35,7 @@ public:
     const std::shared_ptr<Arena>& shareArena() const noexcept { return own_; }
     Context& context() noexcept { return context_; }
 
-    // Objects for the provider's arguments.
+    // Makes a path for the arguments of a provider call.
     ObjectPath& makePath(std::string_view nameSpace, std::string_view className) const;
     Instance& makeInstance(const ObjectPath& path) const;
 

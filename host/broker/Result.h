@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// What a provider delivers its answer to, behind a CMPIResult.
+// The result to which a provider delivers objects, behind a CMPIResult.
 
 #pragma once
 
@@ -9,7 +9,7 @@
 
 namespace Host {
 
-// Made by the host, on its stack, for one call of a provider. Used by the thread that calls.
+// Constructed for one call of a provider, and used by the calling thread.
 class Result : public Encapsulated<Result, CMPIResult, Object::Kind::result> {
 public:
     // The collection must outlive the result.

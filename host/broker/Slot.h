@@ -1,9 +1,9 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Slot<function> fills one slot of a CMPI function table with an ordinary C++ function that
-// takes a reference to the object behind the handle. It implements what all slots have in common:
-// an absent or handle-less object answers CMPI_RC_ERR_INVALID_HANDLE, an exception
-// becomes a status, and the status pointer, which may be null, is written.
+// Slot<function> fills one slot of a CMPI function table with an ordinary C++ function that takes a
+// reference to the object behind the handle. It implements the common parts of all slots: it
+// returns CMPI_RC_ERR_INVALID_HANDLE for a null object and one without a handle, converts
+// exceptions to statuses, and sets the status, whose pointer may be null.
 
 #pragma once
 
@@ -23,10 +23,10 @@
 
 namespace Host {
 
-// A status whose message says why; without a message when no request could hold it.
+// Returns a status with the reason as its message, or without a message when no request is active.
 CMPIStatus makeStatus(CMPIrc code, const char* reason) noexcept;
 
-// What a slot answers when it has no value to give.
+// The value that a slot returns when it fails.
 template <typename Answer>
 constexpr Answer nothing() noexcept
 {
@@ -96,7 +96,7 @@ CMPIStatus* statusOf(const Arguments&... arguments)
 }
 
 // Sets the status and returns what the slot returns with it. The functions that return an int
-// return a code; only void functions have no way to fail.
+// return a code; void functions cannot report a failure.
 template <typename Answer>
 Answer refuse(CMPIStatus* status, CMPIrc code, const char* reason)
 {
@@ -119,8 +119,8 @@ using VariadicPointer = Answer (*)(Arguments..., ...);
 
 } // namespace Detail
 
-// The function is called with the slot's arguments except a trailing CMPIStatus*. It throws
-// Refusal to answer anything but CMPI_RC_OK.
+// The function is called with the slot's arguments except a trailing CMPIStatus*. It throws Refusal
+// to return any code but CMPI_RC_OK.
 template <auto function>
 class Slot {
     using Self = typename Detail::SelfOf<decltype(function)>::type;
@@ -171,7 +171,8 @@ public:
 template <auto function>
 inline constexpr Slot<function> slot{};
 
-// Fills slots of services that the broker does not offer: they answer CMPI_RC_ERR_NOT_SUPPORTED.
+// Fills the slots of services that the broker does not offer: they return
+// CMPI_RC_ERR_NOT_SUPPORTED.
 class NotOffered {
     template <typename Answer, typename... Arguments>
     static Answer call(Arguments... arguments)
@@ -200,7 +201,7 @@ public:
 
 inline constexpr NotOffered notOffered{};
 
-// The object behind a handle given as an argument. Throws Refusal
+// Returns the object behind a handle given as an argument. Throws Refusal
 // (CMPI_RC_ERR_INVALID_HANDLE) when there is none.
 template <typename Self>
 Self& required(const typename Self::Handle* handle)
@@ -211,7 +212,7 @@ Self& required(const typename Self::Handle* handle)
         std::string("no ") + Object::typeName(Self::kindOfSelf) + " behind the handle");
 }
 
-// A text given as an argument. Throws Refusal (CMPI_RC_ERR_INVALID_PARAMETER) for null.
+// Returns a text given as an argument. Throws Refusal (CMPI_RC_ERR_INVALID_PARAMETER) for null.
 inline std::string_view requiredText(const char* text, const char* what)
 {
     if (text == nullptr)

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// A text behind a CMPIString. It is immutable, hence shared freely.
+// A text behind a CMPIString. It is immutable and may be shared.
 
 #pragma once
 
@@ -18,7 +18,7 @@ public:
     // the host of a path.
     static String& makeWithoutText(Arena& arena);
 
-    // Nothing when the character pointer is null.
+    // Returns nothing when the character pointer is null.
     std::optional<std::string_view> text() const noexcept
     {
         return text_.data() == nullptr ? std::nullopt : std::optional{text_};

@@ -12,8 +12,8 @@ namespace Host {
 extern const CMPIBrokerFT upcallFunctions;
 // Object construction and trace messages.
 extern const CMPIBrokerEncFT encapsulationFunctions;
-// Threads, mutexes, conditions and memory blocks, none of which the broker offers. CMPI lets a
-// broker leave the table of memory blocks out; a full table costs a provider no test.
+// Threads, mutexes, conditions and memory blocks, none of which the broker offers. CMPI permits a
+// broker to have no table of memory blocks; with a complete table, providers need no test.
 extern const CMPIBrokerExtFT operatingSystemFunctions;
 extern const CMPIBrokerMemFT memoryFunctions;
 

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Objects and values as text for people.
+// Readable texts of objects and values.
 
 #pragma once
 

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// What CMPI's type codes say about the values they stand for.
+// The properties of CMPI's type codes.
 
 #pragma once
 
@@ -40,7 +40,7 @@ constexpr bool isTextType(CMPIType type) noexcept
     return type == CMPI_string || type == CMPI_chars || type == CMPI_charsptr;
 }
 
-// Bytes of a value that is no object and no text; 0 for every other type.
+// Returns the size in bytes of a value that is no object and no text; 0 for every other type.
 constexpr std::size_t plainSize(CMPIType type) noexcept
 {
     switch (type) {
@@ -65,14 +65,14 @@ constexpr std::size_t plainSize(CMPIType type) noexcept
     }
 }
 
-// Whether properties and arguments can be of this type, array types aside.
+// Returns whether properties and keys can be of this type, array types aside.
 constexpr bool isSimpleType(CMPIType type) noexcept
 {
     return plainSize(type) != 0 || isTextType(type) || type == CMPI_dateTime || type == CMPI_ref ||
            type == CMPI_instance;
 }
 
-// Texts are kept as CMPI_string however they came.
+// Returns the type in which a value is stored: texts are always CMPI_string.
 constexpr CMPIType keptType(CMPIType type) noexcept
 {
     if (!isTextType(elementType(type)))

@@ -19,15 +19,15 @@ class Instance;
 class ObjectPath;
 class String;
 
-// Small and copied freely; a text, date-time, path, instance or array it refers to belongs
-// to the arena it was made in and is never changed through the value.
+// Cheap to copy. A text, date-time, path, instance or array that it refers to belongs to the arena
+// in which it was made and is never changed through the value.
 class Value {
 public:
     // The number of levels to which clients may nest paths in keys: each level doubles the
     // backslashes of the levels inside it.
     static constexpr unsigned maximumNesting = 8;
 
-    // A null value without a type.
+    // Constructs a null value without a type.
     constexpr Value() noexcept = default;
 
     // Copies the value at an address that a provider passed; of CMPI_chars, the text that the
@@ -44,13 +44,14 @@ public:
     static Value of(const Instance& instance) noexcept;
     static Value of(const Array& array) noexcept;
     static Value boolean(bool value) noexcept;
-    // Of any CMPI integer type (and CMPI_char16), cut to its width.
+    // Returns a value of any CMPI integer type (and CMPI_char16), truncated to its width.
     static Value integer(CMPIType type, std::uint64_t value) noexcept;
     static Value real(CMPIType type, double value) noexcept;
-    // Of any type that is no object and no text; reads no more bytes than the type has.
+    // Returns a value of any type that is no object and no text. Reads no more bytes than the type
+    // has.
     static Value plain(const void* value, CMPIType type) noexcept;
     static Value null(CMPIType type) noexcept;
-    // What some object managers pass for a key that a client left out.
+    // Returns the value that some object managers pass for a key that a client left out.
     static Value absent() noexcept;
 
     CMPIType type() const noexcept { return type_; }
@@ -72,13 +73,13 @@ public:
     // Returns the value with copies of the path, instance or array that it refers to.
     Value copiedTo(Arena& arena) const;
 
-    // Returns what a provider gets, which may change the objects in it without changing the
+    // Returns the value for a provider, which may change the objects in it without changing this
     // value. Throws Refusal when no request is active.
     CMPIData handOut() const;
-    // The same objects, not copies of them.
+    // Returns the value with the same objects, not copies of them.
     CMPIData data() const noexcept;
 
-    // The same value, marked as a key's.
+    // Returns the same value, marked as that of a key.
     Value asKey() const noexcept;
 
 private:

@@ -18,10 +18,10 @@ constexpr bool isXmlCharacter(char32_t code)
     return !isSurrogate && code != 0xFFFE && code != 0xFFFF && code <= 0x10FFFF;
 }
 
-// Appends the text as the content of an element or an attribute: with the five predefined
-// entities, and U+FFFD for what XML cannot hold and for bytes that are no UTF-8. Clients read a
-// carriage return as the end of a line, since not all of them understand the numeric reference
-// that would keep it.
+// Appends the text as the content of an element or an attribute: with the five predefined entities,
+// and U+FFFD for characters that XML does not permit and bytes that are not UTF-8. A carriage
+// return is written as it is, which parsers normalise to a line feed, since not all clients support
+// the numeric reference that would preserve it.
 void appendEscaped(std::string& out, std::string_view text);
 
 } // namespace Host::CimXml

@@ -39,13 +39,13 @@ public:
 
     // Returns the elements in it, which must not hold any text beside them.
     const std::vector<Element>& children() const;
-    // Returns the same, all of which must be of these names.
+    // Returns the elements in it, all of which must be of these names.
     const std::vector<Element>& children(std::initializer_list<std::string_view> names) const;
     // Returns the one element in it, which must be of one of these names.
     const Element& child(std::initializer_list<std::string_view> names) const;
-    // Returns the same, or null when there is none.
+    // Returns the one element in it, which must be of one of these names; null when there is none.
     const Element* findChild(std::initializer_list<std::string_view> names) const;
-    // Returns its text, which must be all it holds.
+    // Returns its text. It must contain no elements.
     const std::string& content() const;
 
     [[noreturn]] void fail(
@@ -62,10 +62,10 @@ private:
 };
 
 // Reads a text as XML 1.0 in UTF-8 and returns its outermost element. Elements and attributes that
-// are not of the protocol are skipped, as DSP0200 requires of servers. A document
-// type declaration is refused, so that no entity is declared and nothing expands. Takes time and
-// memory in proportion to the text. Throws RequestError: requestNotWellFormed, or requestNotValid
-// for a document type declaration and beyond the bounds.
+// are not of the protocol are skipped, as DSP0200 requires of servers. A document type declaration
+// is refused, so that no entities are declared or expanded. Takes time and memory in proportion to
+// the text. Throws RequestError: requestNotWellFormed, or requestNotValid for a document type
+// declaration and beyond the bounds.
 Element readDocument(std::string_view text, std::size_t maximumDepth = defaultMaximumDepth);
 
 } // namespace Host::CimXml

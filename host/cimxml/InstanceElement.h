@@ -20,10 +20,10 @@ namespace Host::CimXml {
 void writeValue(std::string& out, const Value& value);
 
 // Writes instances as INSTANCE with PROPERTY, PROPERTY.ARRAY or PROPERTY.REFERENCE for each
-// selected property that the instance has, in its order. What a value does not say, such as the
-// type of a null, comes from the class. Keeps the markup around the values, which is the same in
-// all instances of a class: that takes a third of the time of making it anew. Used by one thread at
-// a time.
+// selected property that the instance has, in its order. Data that a value lacks, such as the type
+// of a null, is taken from the class. The markup around the values, which is the same in all
+// instances of a class, is cached, which takes a third of the time of writing it anew. Used by one
+// thread at a time.
 class InstanceMarkup {
 public:
     explicit InstanceMarkup(ObjectSelection selection = {}) : selection_(std::move(selection)) {}

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Values as DSP0201 spells them.
+// The text form of values in DSP0201.
 
 #pragma once
 

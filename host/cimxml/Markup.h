@@ -1,7 +1,7 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Elements as they are written: always with a start tag and an end tag, since some clients do not
-// know empty-element tags, with the five predefined entities and without CDATA.
+// Writes elements: always with a start tag and an end tag, since some clients do not support
+// empty-element tags, with the five predefined entities and without CDATA.
 
 #pragma once
 

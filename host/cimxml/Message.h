@@ -22,12 +22,12 @@ public:
     const std::string& protocolVersion() const noexcept { return protocolVersion_; }
     // The name of the intrinsic or extrinsic method, as the client spells it.
     const std::string& methodName() const noexcept { return methodName_; }
-    // Whether the method is one of the protocol itself (DSP0200) and not of a class.
+    // Returns whether the method is one of the protocol itself (DSP0200) and not of a class.
     bool isIntrinsic() const noexcept { return isIntrinsic_; }
-    // Such as root/cimv2, as the client spells it.
+    // The namespace as the client spells it, such as root/cimv2.
     const std::string& nameSpace() const noexcept { return nameSpace_; }
 
-    // Of the body, in bytes.
+    // The size of the body in bytes.
     std::size_t size() const noexcept { return size_; }
 
     // The IMETHODCALL or METHODCALL.

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The parts of an object that a response holds: PropertyList, LocalOnly, IncludeQualifiers and
+// The parts of an object that a response contains: PropertyList, LocalOnly, IncludeQualifiers and
 // IncludeClassOrigin of DSP0200.
 
 #pragma once

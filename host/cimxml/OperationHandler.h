@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The interface between a transport and what carries operations out.
+// The interface between a transport and the component that executes operations.
 
 #pragma once
 
@@ -18,7 +18,7 @@ struct Caller {
     std::string address;   // for the log
 };
 
-// The response to one message. Used by one thread at a time, which need not be the one that made
+// The response to one message. Used by one thread at a time, which need not be the one that created
 // it.
 class Response {
 public:
@@ -37,9 +37,9 @@ class OperationHandler {
 public:
     virtual ~OperationHandler() = default;
 
-    // Carries the operation out, so that an operation that fails returns an error response. The
-    // response holds the objects once and writes their XML when its pieces are asked for. Throws
-    // RequestError for a message that is not loosely valid, and std::bad_alloc.
+    // Executes the operation; a failed operation yields an error response. The response holds the
+    // objects and writes their XML when its pieces are requested. Throws RequestError for a message
+    // that is not loosely valid, and std::bad_alloc.
     virtual std::unique_ptr<Response> answer(const Message& message, const Caller& caller) = 0;
 };
 

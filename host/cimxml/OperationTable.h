@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The intrinsic operations that are offered, with their parameters (DSP0200).
+// The supported intrinsic operations with their parameters (DSP0200).
 
 #pragma once
 

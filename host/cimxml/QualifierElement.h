@@ -1,7 +1,7 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Qualifiers and their declarations as elements (DSP0201), and what properties of classes and of
-// instances have in common.
+// Qualifiers and their declarations as elements (DSP0201), and the common parts of the properties
+// of classes and of instances.
 
 #pragma once
 

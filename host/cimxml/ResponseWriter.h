@@ -23,9 +23,8 @@ class Message;
 // Returns the whole response of an operation that failed.
 std::string errorResponse(const Message& message, CMPIrc code, std::string_view description);
 
-// Appends the response of an operation that succeeded: what precedes the objects, each object in
-// the element that the operation returns it in, and what follows them. Holds no object. Used by one
-// thread at a time.
+// Appends the response of a successful operation: the beginning, each object in the element in
+// which the operation returns it, and the end. Holds no object. Used by one thread at a time.
 class ResponseWriter {
 public:
     // The repository must outlive the writer. The selection is the operation's own; for one that

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The object manager: dispatches an operation to the providers of the classes it concerns.
+// Dispatches an operation to the providers of the classes that it concerns.
 
 #pragma once
 
@@ -18,10 +18,10 @@
 
 namespace Host {
 
-// After its construction used from any thread, by many at a time.
+// Thread-safe after its construction.
 //
-// An operation is called within a Request over the manager's broker on the calling thread, and
-// with the request's context. What it returns lives as long as the request. It throws Refusal when
+// An operation is called within a Request over the manager's broker on the calling thread, and with
+// the request's context. The returned objects live as long as the request. It throws Refusal when
 // it fails:
 //
 //   CMPI_RC_ERR_INVALID_CLASS   the path, or a class name beside it, names an unknown class
@@ -30,17 +30,15 @@ namespace Host {
 //                               provider serves
 //   CMPI_RC_ERR_FAILED          providers call up in a circle
 //
-// and with a provider's own code and message when that fails. Of several providers, one that fails
-// takes nothing away from what others have found: its failure is written to the log. Only where
-// nothing at all was found the first failure is the result, since "there is nothing" would not be
-// true.
+// and with a provider's own code and message when that fails. Where several providers are called, a
+// failure of one is logged and the objects of the others are returned. Where none of them returned
+// an object, the first failure is thrown, since an empty result would be wrong.
 //
-// Property lists end with a null and are null for all properties. They are the providers' to
-// observe, by the filter on their instances. Class and role names are null where a client left
-// them out.
+// Property lists end with a null and are null for all properties. The providers apply them, by the
+// filter of their instances. Class and role names are null where a client left them out.
 //
-// Providers call up through the broker and come back here, on the same thread, in the same
-// request and with the context they pass; no lock is held meanwhile.
+// Up-calls of providers call the manager on the same thread, in the same request and with the
+// context that they pass; no lock is held meanwhile.
 class Manager {
 public:
     using Association = Routing::Association;
@@ -56,7 +54,7 @@ public:
 
     const Broker& broker() const noexcept { return broker_; }
 
-    // Of the path's class and of all classes below it.
+    // Both return the objects of the path's class and of all its subclasses.
     CollectedResult enumerateInstanceNames(const Context& context, const ObjectPath& path) const;
     CollectedResult enumerateInstances(
         const Context& context, const ObjectPath& path, const char** properties) const;
@@ -70,7 +68,7 @@ public:
         const Association& association, const char** properties) const;
     CollectedResult associatorNames(
         const Context& context, const ObjectPath& source, const Association& association) const;
-    // Of the association, resultClass, which is the association class here, and role count.
+    // Of the association, only resultClass (here the association class) and role are used.
     CollectedResult references(const Context& context, const ObjectPath& source,
         const Association& association, const char** properties) const;
     CollectedResult referenceNames(

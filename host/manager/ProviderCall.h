@@ -15,21 +15,21 @@
 
 namespace Host {
 
-// Counts the provider calls that this thread has nested in one another.
+// Counts the nested provider calls of this thread.
 class CallDepth {
 public:
     // Providers that call one another need two or three levels.
     static constexpr unsigned maximum = 10;
 
-    // Throws Refusal (CMPI_RC_ERR_FAILED) beyond the maximum: providers call up in a circle.
+    // Throws Refusal (CMPI_RC_ERR_FAILED) beyond the maximum, which a cycle of up-calls exceeds.
     explicit CallDepth(const ProviderRegistration& registration);
     ~CallDepth();
     CallDepth(const CallDepth&) = delete;
     CallDepth& operator=(const CallDepth&) = delete;
 };
 
-// Returns the path that a provider gets: a copy of its own, with the class's name as it is
-// declared, however the client spelt it.
+// Returns the path for a provider: a copy with the class's name as it is declared, whatever the
+// client's spelling.
 const CMPIObjectPath* targetOf(const ObjectPath& path, const std::string& className);
 
 // Throws Refusal with the status's code and message unless it is OK. The operation names what a
@@ -37,8 +37,8 @@ const CMPIObjectPath* targetOf(const ObjectPath& path, const std::string& classN
 void checkStatus(
     const ProviderRegistration& registration, const char* operation, const CMPIStatus& status);
 
-// Calls a provider's function and returns what it delivered. Throws Refusal when the provider
-// leaves the function out, when it throws, and with its status unless that is OK.
+// Calls a provider's function and returns what it delivered. Throws Refusal when the provider lacks
+// the function, when it throws, and with its status unless that is OK.
 template <typename MI, typename Function, typename... Arguments>
 CollectedResult callProvider(const ProviderRegistration& registration, const char* operation,
     MI& mi, Function function, const Context& context, const CMPIObjectPath* target,

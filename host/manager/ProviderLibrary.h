@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// A CMPI provider library in memory, and the management interfaces (MIs) that it created.
+// A loaded CMPI provider library, and the management interfaces (MIs) that it created.
 
 #pragma once
 
@@ -18,11 +18,11 @@ class Broker;
 // Created and destroyed by one thread; the MIs may be used from any thread.
 class ProviderLibrary {
 public:
-    // Loads the file with its symbols kept to itself. The broker must outlive the library.
-    // Throws std::runtime_error with the loader's reason, which names the file.
+    // Loads the file with local symbols (RTLD_LOCAL). The broker must outlive the library. Throws
+    // std::runtime_error with the loader's reason, which names the file.
     ProviderLibrary(const Broker& broker, const std::string& file);
     // Calls the cleanup of every MI and unloads the library, unless an MI refuses to be unloaded:
-    // then it stays in memory until the process ends.
+    // then it stays loaded until the process ends.
     ~ProviderLibrary();
     ProviderLibrary(const ProviderLibrary&) = delete;
     ProviderLibrary& operator=(const ProviderLibrary&) = delete;

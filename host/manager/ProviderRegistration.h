@@ -8,10 +8,10 @@
 
 namespace Host {
 
-// Which provider serves a class, and where it is found. A class has one registration.
+// The provider of a class and its library. A class has one registration.
 struct ProviderRegistration {
     std::string className;
-    // What the names of the provider's factory functions begin with.
+    // The prefix of the names of the provider's factory functions.
     std::string providerName;
     // With its folder; empty for a provider inside the process.
     std::string libraryFile;

@@ -35,26 +35,25 @@ public:
     // Returns the provider of the path's class itself; null where no provider serves it.
     const ProviderRegistration* findProviderOf(const ObjectPath& path) const;
 
-    // Returns the providers of the path's class and of all below it, in the order of registration;
-    // never empty.
+    // Returns the providers of the path's class and of its subclasses, in the order of
+    // registration; never empty.
     Registrations providersBelow(const ObjectPath& path) const;
 
-    // Returns the providers of the association classes that can lead away from the source: those
-    // of the named class or below it that refer by the role to the source's class or to one above
-    // it, and by another reference, the result role, to what may be of the result class. May be
-    // empty.
+    // Returns the providers of the association classes that can lead from the source: the named
+    // class or its subclasses that refer by the role to the source's class or a superclass, and by
+    // another reference, the result role, to objects that may be of the result class. May be empty.
     Registrations associationProviders(
         const ObjectPath& source, const Association& association) const;
 
-    // Returns the result class for a provider that may know no superclasses: null instead of one
-    // above all that the association leads to, since it excludes nothing there.
+    // Returns the result class for a provider that may not support superclasses: null instead of a
+    // superclass of all far ends, since that excludes nothing.
     const char* resultClassFor(const ProviderRegistration& registration, const ObjectPath& source,
         const Association& association) const;
 
-    // Returns the name of the path's class as it is registered; as it stands when it is not.
+    // Returns the name of the path's class as it is registered, or unchanged when it is not.
     std::string classNameOf(const ObjectPath& path) const;
 
-    // Whether the class is the other one or below it.
+    // Returns whether the class is the other one or derived from it.
     bool isA(
         std::string_view nameSpace, std::string_view className, std::string_view ancestor) const;
 

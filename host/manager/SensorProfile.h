@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Which providers serve the classes of the sensor profile.
+// The registrations of the providers of the sensor profile.
 
 #pragma once
 

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Builds a class from what its declaration says and what its superclass passes on.
+// Builds a class from its declaration and its superclass.
 
 #pragma once
 

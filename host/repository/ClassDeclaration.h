@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// A class with all it inherits, as a repository returns it.
+// A class with its inherited properties and qualifiers, as a repository returns it.
 
 #pragma once
 
@@ -46,7 +46,7 @@ struct ClassDeclaration {
     // Returns null when there is none of that name.
     const PropertyDeclaration* property(std::string_view propertyName) const;
 
-    // Whether the class is derived from the other one, at any distance; not from itself.
+    // Returns whether the class is derived from the other one, at any distance; not from itself.
     bool isDerivedFrom(std::string_view ancestor) const;
     bool isDerivedFrom(const ClassDeclaration& ancestor) const;
 };

@@ -32,8 +32,8 @@ using Namespaces = std::vector<std::unique_ptr<Namespace>>;
 // namespace ("root/interop")` holds for the rest of the file and for the files that are included
 // there.
 //
-// For one thread. Every function throws std::runtime_error `FILE:LINE:COLUMN: reason` for what is
-// wrong with a text; the compiler can only be destroyed afterwards.
+// For one thread. Every function throws std::runtime_error `FILE:LINE:COLUMN: reason` for an error
+// in a text; the compiler can only be destroyed afterwards.
 class Compiler {
 public:
     // Also throws std::runtime_error `FILE: reason` for a file that cannot be read.
@@ -43,7 +43,7 @@ public:
     void compileText(
         std::string_view text, const std::filesystem::path& file, std::string_view nameSpace);
 
-    // Returns what has been compiled. Throws at the first reference whose class has not been
+    // Returns the compiled repository. Throws at the first reference whose class has not been
     // declared.
     std::unique_ptr<const Repository> finish() &&;
 

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Carries out the declarations of one MOF file.
+// Executes the declarations of one MOF file.
 
 #pragma once
 
@@ -15,7 +15,8 @@
 
 namespace Host {
 
-// What the parser has read of a declaration. A declaration takes the optional parts with it.
+// The parts of a declaration that the parser has read. Optional parts are moved out when they are
+// used.
 struct DeclarationParts {
     Word pragmaName;
     Word className;
@@ -31,8 +32,9 @@ struct DeclarationParts {
     std::vector<Word> flavors;
 };
 
-// The parser fills in the parts, in the order of the text, and calls a function at the end of
-// each construct. The functions throw tao::pegtl::parse_error for what contradicts the namespace.
+// The parser fills in the parts, in the order of the text, and calls a function at the end of each
+// construct. The functions throw tao::pegtl::parse_error for a declaration that contradicts the
+// namespace.
 class FileCompiler {
 public:
     // Appends the classes that references name; the caller has yet to check them.

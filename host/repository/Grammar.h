@@ -1,7 +1,7 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
 // The part of the MOF grammar (DSP0004, annex A) that the files in schema/ use. A rule that must
-// match names in `expected` what an error message says was expected in its place.
+// match has in `expected` the text that an error message says was expected.
 
 #pragma once
 

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Words and values of a MOF file as they are written, with their places.
+// Words and values in the text of a MOF file, with their positions.
 
 #pragma once
 
@@ -24,7 +24,7 @@ struct Word {
 struct Literal {
     enum class Kind { null, truth, number, text };
     Kind kind;
-    std::string text; // for a string, what stands between the quotation marks
+    std::string text; // for a string, the text between the quotation marks
     SourcePosition position;
 };
 
@@ -36,8 +36,8 @@ struct Initializer {
 };
 
 // Returns the value in the form of the type, null for one that is not written. Throws
-// tao::pegtl::parse_error at the literal that does not fit the type, and at the first one of a
-// list that stands for a single value or the other way round.
+// tao::pegtl::parse_error at a literal that does not fit the type, at the first one of a list for a
+// single value, and at a single value for an array.
 Constant toConstant(const Initializer& written, CMPIType type);
 
 } // namespace Host

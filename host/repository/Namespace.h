@@ -25,15 +25,15 @@ public:
     const ClassDeclaration* findClass(std::string_view className) const;
     const QualifierDeclaration* findQualifier(std::string_view qualifierName) const;
 
-    // In the order of their declaration.
+    // Returns the classes in the order of their declaration.
     const std::vector<std::unique_ptr<ClassDeclaration>>& classes() const { return classes_; }
     const std::vector<std::unique_ptr<const QualifierDeclaration>>& qualifiers() const
     {
         return qualifiers_;
     }
 
-    // REQUIRES: nothing of that name is there yet; the superclass is of this namespace.
-    // What is added stays where it is as long as the namespace lives.
+    // REQUIRES: the name is not declared yet; the superclass is of this namespace. The address of
+    // an added object does not change.
     void add(std::unique_ptr<ClassDeclaration> declared);
     void add(std::unique_ptr<const QualifierDeclaration> declared);
 

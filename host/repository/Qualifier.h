@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Qualifiers (DSP0004, 5.6): their declarations, and the ones in effect on an element.
+// Qualifiers (DSP0004, 5.6): their declarations, and those in effect on an element.
 
 #pragma once
 
@@ -15,7 +15,7 @@
 
 namespace Host {
 
-// The kinds of elements that a qualifier may stand on.
+// The kinds of elements that a qualifier may apply to.
 enum class Scope : std::uint8_t {
     classes = 1,
     association = 2,
@@ -69,16 +69,16 @@ struct Qualifier {
     const Flavor& flavor() const noexcept { return declaration->flavor; }
 };
 
-// Those that an element carries itself come first, then the inherited ones.
+// The qualifiers that an element specifies itself precede the inherited ones.
 using QualifierList = std::vector<Qualifier>;
 
 // Returns null when there is none of that name.
 const Qualifier* findQualifier(const QualifierList& qualifiers, std::string_view name);
 
-// Returns the value of a boolean qualifier; false when it is not there.
+// Returns the value of a boolean qualifier; false when it is absent.
 bool isQualified(const QualifierList& qualifiers, std::string_view name);
 
-// Returns the value of a string qualifier; empty when it is not there or null.
+// Returns the value of a string qualifier; empty when it is absent or null.
 std::string_view qualifierText(const QualifierList& qualifiers, std::string_view name);
 
 } // namespace Host

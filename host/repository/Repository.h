@@ -15,12 +15,12 @@
 namespace Host {
 
 // Finds namespaces, classes and qualifiers by name in any letter case. A repository is immutable:
-// any thread may call it at any time, and what it returns lives as long as the repository.
+// any thread may call it at any time, and the returned objects live as long as the repository.
 class Repository : public ClassInformation {
 public:
     explicit Repository(std::vector<std::unique_ptr<Namespace>> namespaces);
 
-    // In the order in which the compiler first met them.
+    // Returns the namespaces in the order of their first use.
     const std::vector<std::unique_ptr<const Namespace>>& namespaces() const noexcept
     {
         return namespaces_;
@@ -35,8 +35,8 @@ public:
     enum class Depth { direct, deep };
 
     // Returns the subclasses of a class in the order of their declaration; with Depth::deep, each
-    // is followed by its own subclasses. An empty class name stands for a superclass of all
-    // roots. Returns nothing when the namespace or the class is not known.
+    // is followed by its own subclasses. For an empty class name, returns those below a superclass
+    // of all roots. Returns nothing when the namespace or the class is not known.
     std::vector<const ClassDeclaration*> subclasses(
         std::string_view nameSpace, std::string_view className, Depth depth) const;
 

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Identity, size and times of a file, which differ from one of its states to the next.
+// Identity, size and times of a file, by which changes of the file are detected.
 
 #pragma once
 
@@ -11,8 +11,8 @@
 
 namespace Vorn {
 
-// Since 1970. Both numbers as the kernel gives them: file times reach beyond what an int64 of
-// nanoseconds can hold.
+// The time since 1970 as the kernel returns it: an int64 of nanoseconds could not hold all file
+// times.
 struct FileTime {
     std::int64_t seconds = 0;
     std::int64_t nanoseconds = 0;
@@ -25,7 +25,7 @@ struct FileStamp {
     std::uint64_t inode = 0;
     std::int64_t size = 0;
     FileTime modified;
-    FileTime changed; // moves also when a tool sets the time of modification
+    FileTime changed; // changes also when a tool sets the time of modification
 
     bool operator==(const FileStamp&) const = default;
 };

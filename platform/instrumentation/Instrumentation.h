@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// A cursor over the sensor nodes of the present machine.
+// A cursor over the sensor nodes of this machine.
 
 #pragma once
 

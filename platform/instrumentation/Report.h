@@ -11,7 +11,7 @@ namespace Vorn {
 constexpr int messageLevel = 6000;
 
 // Writes a line to the log channel. `module` is the name of the calling file without folder and
-// extension. The defaults are those of the place that calls.
+// extension. The defaults are the function and line of the call.
 inline void report(const char* module, const std::string& text,
     const char* function = __builtin_FUNCTION(),
     unsigned line = static_cast<unsigned>(__builtin_LINE())) noexcept

@@ -1,7 +1,7 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The interface of what Vorn::Instrumentation reads: a source lists and reads the sensor nodes of
-// one kind of hardware description, the kernel's hwmon interface or a model file.
+// The interface of the sources of Vorn::Instrumentation: a source lists and reads the sensor nodes
+// of one kind of hardware description, the kernel's hwmon interface or a model file.
 
 #pragma once
 
@@ -14,12 +14,12 @@
 
 namespace Vorn {
 
-// One sensor of a source, as it is listed.
+// One sensor in the list of a source.
 struct Node {
     std::string path;        // unique in the machine and the same after a restart
-    std::string description; // UTF-8, what a person calls the sensor
+    std::string description; // UTF-8, the name that is shown
     unsigned sensorType = 0; // a NodeLexicon::NodeType number, or a code of the source's own
-    std::size_t token = 0;   // the source's own; names the node when it is read
+    std::size_t token = 0;   // identifies the node when the source reads it
 };
 
 // The status and the values of one node at one moment. A value the node does not have is absent.

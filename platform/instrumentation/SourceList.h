@@ -1,8 +1,8 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The text form of a list of sources, as VORN_INSTRUMENTATION carries it:
-// `scheme[:argument]` entries with commas between them. A backslash makes the character after it
-// an ordinary one, so that a file name may hold a comma: `model:/srv/a\,b.json`.
+// The text form of a list of sources, as VORN_INSTRUMENTATION carries it: `scheme[:argument]`
+// entries with commas between them. A backslash removes the special meaning of the character after
+// it, so that a file name may contain a comma: `model:/srv/a\,b.json`.
 
 #pragma once
 

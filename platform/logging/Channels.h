@@ -21,7 +21,7 @@ namespace RynLog {
 // Writes lines under its name to a sink. Thread-safe.
 class Channel {
 public:
-    // Throws std::invalid_argument when the setting makes no sense.
+    // Throws std::invalid_argument when the setting is invalid.
     Channel(std::string name, const std::string& setting);
     ~Channel();
     Channel(const Channel&) = delete;
@@ -41,7 +41,7 @@ private:
 
     std::string name_;
     std::unique_ptr<spdlog::logger> logger_; // null when the channel is off
-    mutable std::mutex guard_;               // of what follows
+    mutable std::mutex guard_;               // for the members that follow
     mutable std::string problem_;
     mutable bool isReported_ = false;
 };

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Where the two channels lead and which lines are wanted.
+// The destinations of the two channels, and the lowest level that is written.
 
 #pragma once
 
@@ -13,11 +13,11 @@ struct LogSettings {
     int level = 6000;           // RYNLOG_LEVEL: lowest level written
     std::string log = "syslog"; // RYNLOG_LOG: syslog, stderr, file:PATH or off
     std::string trace = "off";  // RYNLOG_TRACE: the same values
-    std::string problem{};      // which settings make no sense; empty when all do
+    std::string problem{};      // names invalid settings; empty without any
 };
 
-// Reads the environment with secure_getenv; an empty variable counts as not set. A value that makes
-// no sense is named in `problem`, and its default is used.
+// Reads the environment with secure_getenv; an empty variable counts as not set. An invalid value
+// is named in `problem`, and its default is used.
 LogSettings settingsFromEnvironment();
 
 // The parsed value of RYNLOG_LOG or RYNLOG_TRACE.
@@ -32,11 +32,11 @@ struct SinkSetting {
 std::optional<SinkSetting> parseSinkSetting(const std::string& text);
 
 // Replaces the settings in effect, which are at first those of the environment. Lines that other
-// threads are writing are finished with the settings they began with. A `problem` becomes the
-// first line of the log channel. A file is created when missing and always appended to; it stays
-// open until the next call or until the library is unloaded. One that cannot be opened
-// or written is reported to syslog, once, and the lines of its channel are lost.
-// Throws std::invalid_argument naming a sink that makes no sense; nothing is replaced then.
+// threads are writing are finished with the settings they began with. A `problem` becomes the first
+// line of the log channel. A file is created when missing and always appended to; it stays open
+// until the next call or until the library is unloaded. One that cannot be opened or written is
+// reported to syslog, once, and the lines of its channel are lost. Throws std::invalid_argument
+// naming an invalid sink; nothing is replaced then.
 void configure(const LogSettings& settings);
 
 } // namespace RynLog

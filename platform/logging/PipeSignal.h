@@ -7,8 +7,8 @@
 
 namespace RynLog {
 
-// Blocks SIGPIPE on this thread while it lives, so that a write to a broken pipe fails with EPIPE
-// instead of ending the process. The process's signal handlers are not changed.
+// Blocks SIGPIPE on this thread during its lifetime, so that a write to a broken pipe fails with
+// EPIPE instead of ending the process. The process's signal handlers are not changed.
 class PipeSignalBlocked {
 public:
     PipeSignalBlocked() noexcept;
@@ -29,9 +29,9 @@ private:
 // written.
 int writeWhole(int descriptor, std::string_view bytes) noexcept;
 
-// Does the same on the process's standard error, but never blocks: where its reader does not read,
-// the rest is not written (EAGAIN). A text of up to PIPE_BUF bytes is one write, so that lines of
-// several threads stay whole.
+// Does the same on the process's standard error, but never blocks: when its buffer is full, the
+// rest is not written (EAGAIN). A text of up to PIPE_BUF bytes is one write, so that lines of
+// several threads are not interleaved.
 int writeToStandardError(std::string_view text) noexcept;
 
 } // namespace RynLog

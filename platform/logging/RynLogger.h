@@ -11,13 +11,12 @@ namespace RynLog {
 // Levels in use: 3000 marks with parameters, 4000 marks without, 6000 messages; a higher
 // number is more important. Lines below the wanted level are dropped.
 //
-// A line in a file or on standard error, written whole by one system call:
-//   2026-11-21T01:02:03.000004Z log 6000 Nimbrel.Sensor setVector(Sensor:740) text
-// Time is UTC. In every text of a line a newline appears as \n, another control character as
-// \xNN and a backslash as \\, so that no text can look like a second line.
-// In syslog the line begins with the channel (syslog has a clock of its own); facility daemon,
-// severity warning from level 6000 up, debug below. The identity under which the process writes
-// to syslog is left as the process set it.
+// A line in a file or on standard error is written by one system call: 2026-11-21T01:02:03.000004Z
+// log 6000 Nimbrel.Sensor setVector(Sensor:740) text Time is UTC. In every text of a line a newline
+// appears as \n, another control character as \xNN and a backslash as \\, so that no text can look
+// like a second line. In syslog the line begins with the channel (syslog has a clock of its own);
+// facility daemon, severity warning from level 6000 up, debug below. The identity under which the
+// process writes to syslog is left as the process set it.
 //
 // Every function may be called from any thread and never throws: a line that cannot be
 // written is lost. A null text is written as (null).
@@ -29,13 +28,13 @@ public:
         const std::string& component, int level, const char* reservedText, int reservedFirst,
         int reservedSecond, const std::string& text) noexcept;
 
-    // The same for the trace channel.
+    // Writes one line to the trace channel, with the same arguments.
     static void traceLevelMessage(const char* function, const char* file, unsigned line,
         const std::string& component, int level, const char* reservedText, int reservedFirst,
         int reservedSecond, const std::string& text) noexcept;
 
     // Whether a line of the level would be written to either channel. Costs one relaxed atomic
-    // load, so that a caller need not compose a line that is not written.
+    // load, so that callers can avoid formatting lines that are not written.
     static bool isWanted(int level) noexcept;
 
     // Returns why the log channel's file could not be opened or its last line not be written; empty

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// UTF-8 as RFC 3629 defines it: overlong forms, surrogates and what lies above U+10FFFF are not
+// UTF-8 as RFC 3629 defines it: overlong forms, surrogates and numbers above U+10FFFF are not
 // characters.
 
 #pragma once

@@ -32,10 +32,10 @@ bool isSameName(std::string_view a, std::string_view b);
 // their order does not matter. Host names are ignored, namespaces (compared without regard to
 // case and to outer slashes) too where either side has none.
 //
-// Values are compared by type: integers of any width and signedness by their value, reals by
-// their value, texts and points in time character by character. A key that has no value (its
-// state says null or not found, or it is an empty pointer) counts as not there; one of a type
-// that no key can have equals nothing.
+// Values are compared by type: integers of any width and signedness by their value, reals by their
+// value, texts and points in time character by character. A key that has no value (its state says
+// null or not found, or it is an empty pointer) counts as absent; one of a type that no key can
+// have equals nothing.
 //
 // Keys of type reference count, on either side, only when comparesReferences is true, and are
 // then compared as paths by the same rule; paths nested deeper than eight are unequal.

@@ -24,7 +24,7 @@ inline constexpr const char* capabilitiesClass = "ZUMLO_SensorEnabledLogicalElem
 
 struct ProviderFiles {
     std::string sensors;
-    std::optional<std::string> computerSystem; // nothing when nobody serves that class
+    std::optional<std::string> computerSystem; // nothing when no provider serves that class
 };
 
 using Instances = std::vector<const Host::Instance*>;

@@ -26,7 +26,7 @@ public:
     std::string_view name() const { return text("ElementName"); }
     std::string_view deviceId() const { return text("DeviceID"); }
 
-    // Returns nothing when the sensor delivers no value: when CurrentReading is missing or out of
+    // Returns nothing when the sensor has no reading: when CurrentReading is missing or out of
     // range, when communication is lost (OperationalStatus 13), and when CurrentReading is 0 and
     // the sensor is out of contact (OperationalStatus 12), disabled or offline (EnabledState 3 or
     // 6).

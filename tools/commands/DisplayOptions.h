@@ -19,7 +19,7 @@ public:
     void addColor(CLI::App& parser);
 
     bool isJson() const { return isJson_; }
-    // Whether the option, or else the environment, asks for colors on standard output.
+    // Returns whether the option, or else the environment, selects colors on standard output.
     bool isColored() const;
 
 private:

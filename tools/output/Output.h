@@ -9,14 +9,14 @@
 
 namespace Tools {
 
-// Opens descriptors 0 to 2 where the caller left them closed, so that no file opened later gets
-// one of these numbers. Reading and writing there fails, as on a closed one.
+// Opens descriptors 0 to 2 where they are closed, so that no file opened later gets one of these
+// numbers. Reading and writing them fails, as with a closed one.
 void reserveStandardStreams();
 
 // Writes the whole text. Throws std::system_error.
 void writeAll(int descriptor, std::string_view text);
 
-// Buffers what is written to a descriptor.
+// A buffered writer to a descriptor.
 class Output {
 public:
     explicit Output(int descriptor) : descriptor_(descriptor) {}

@@ -13,7 +13,7 @@
 
 namespace Tools {
 
-// Stands for a missing value.
+// The text of a missing value.
 inline constexpr const char* absent = "-";
 
 struct Cell {

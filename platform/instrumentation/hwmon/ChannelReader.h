@@ -8,7 +8,7 @@
 namespace Vorn::Hwmon {
 
 // Reads a fan, voltage or temperature feature from the kernel, with the administrator's `compute`
-// lines applied and without unset limits. REQUIRES: a ChipList lock is held; the feature is there.
+// lines applied and without unset limits. REQUIRES: a ChipList lock is held; the feature exists.
 Channel readChannel(const Feature& feature);
 
 } // namespace Vorn::Hwmon

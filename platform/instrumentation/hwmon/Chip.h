@@ -28,7 +28,7 @@ struct FeatureId {
     std::string name;
 };
 
-// A feature of a chip in libsensors' present list; null pointers when it is gone.
+// A feature of a chip in libsensors' current list; null pointers when it was removed.
 struct Feature {
     const sensors_chip_name* chip = nullptr;
     const sensors_feature* feature = nullptr;
@@ -45,16 +45,16 @@ std::vector<const sensors_feature*> featuresOf(
 std::string printedName(const sensors_chip_name& chip);
 
 // Returns the chip's folder in sysfs, which changes when a chip is unplugged and plugged in again;
-// nothing when the chip is gone.
+// nothing when the chip was removed.
 std::optional<std::pair<dev_t, ino_t>> folderOf(const sensors_chip_name& chip);
 
 // Returns the administrator's or the driver's label, unchanged, or the feature's name where there
-// is none or the chip is gone; empty when libsensors has no memory.
+// is none or the chip was removed; empty when libsensors runs out of memory.
 std::string labelOf(const Feature& feature);
 
 FeatureId identify(const Feature& feature);
 
-// Looks the feature up by name, which costs little beside the reading that follows.
+// Finds the feature by name, which costs little compared with reading it.
 Feature find(const FeatureId& id);
 
 } // namespace Vorn::Hwmon

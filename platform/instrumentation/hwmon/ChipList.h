@@ -17,10 +17,10 @@ namespace Vorn::Hwmon {
 // it excludes all others: a caller of libsensors holds a lock of this class for the duration of the
 // call, and no longer, so that a thread with two cursors cannot block itself.
 //
-// While libsensors reads its configuration it sets the process's locale to "C" and back, which
-// its interface gives no way to avoid. It happens at the first request and when the machine
-// or the configuration has changed. Another user of libsensors in the same process shares the
-// list; there is no way to keep the two apart.
+// While libsensors reads its configuration it sets the process's locale to "C" and back, which its
+// interface cannot prevent. This happens at the first request and when the machine or the
+// configuration has changed. Another user of libsensors in the same process shares the list and is
+// not excluded by the lock.
 class ChipList {
 public:
     using Lock = std::shared_lock<std::shared_mutex>;
@@ -28,11 +28,11 @@ public:
     // Returns the list of this process. libsensors is released when the library is unloaded.
     static ChipList& instance();
 
-    // Returns the chips that the machine has now. Throws std::runtime_error with libsensors'
-    // reason.
+    // Renews the list if the machine has changed, and locks it. Throws std::runtime_error with
+    // libsensors' reason.
     Lock lockPresent();
 
-    // Returns the chips as they were last listed.
+    // Locks the list without renewing it.
     Lock lockKnown();
 
     ~ChipList();

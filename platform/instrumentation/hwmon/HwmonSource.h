@@ -17,8 +17,8 @@ struct FeatureId;
 
 // Serves the fans, voltages and temperatures of the kernel's hwmon interface, a node for each
 // feature, through libsensors, so that the `label`, `compute` and `ignore` lines of the
-// administrator's configuration apply. Chips added or removed show when nodes are listed next; a
-// node whose chip was removed since reads as status 13 without properties.
+// administrator's configuration apply. Added and removed chips are found when nodes are listed
+// next; a node whose chip was removed meanwhile has status 13 and no properties.
 class HwmonSource final : public Source {
 public:
     HwmonSource();

@@ -9,7 +9,7 @@ namespace Vorn::Hwmon {
 
 // Keeps libsensors from printing and from ending the process. It reports through function pointers
 // that are global to the process; by default they print to standard error, and the one for fatal
-// errors calls exit(). An object replaces them while it lives and then restores them.
+// errors calls exit(). An object replaces them during its lifetime and then restores them.
 //
 // The fatal error is a lack of memory. Its hook must not return, so it throws std::bad_alloc
 // through libsensors, which holds no locks and whose unwind tables let exceptions pass; what
@@ -26,8 +26,8 @@ public:
         int line; // 0 when the error has no line
     };
 
-    // Collects the errors in the configuration while it lives.
-    // REQUIRES: one object at a time in the process.
+    // Collects the errors in the configuration during its lifetime. REQUIRES: only one object
+    // exists at a time in the process.
     class ParseErrors {
     public:
         ParseErrors();

@@ -11,10 +11,10 @@ namespace Vorn::Hwmon {
 // Returns the files that libsensors reads by default, in its order; see sensors.conf(5).
 std::vector<std::filesystem::path> configurationFiles();
 
-// The text of all of these files. Left to itself, the parser of libsensors 3.6.0 keeps a pointer to
-// the last `chip` statement through sensors_cleanup(); a statement that comes before the first
-// valid `chip` statement is then written to freed memory. The text begins with one of its own,
-// which names no chip there is, so that this cannot happen.
+// The text of all of these files. By default, the parser of libsensors 3.6.0 keeps a pointer to the
+// last `chip` statement through sensors_cleanup(); a statement that comes before the first valid
+// `chip` statement is then written to freed memory. The text prevents that: it begins with a `chip`
+// statement that matches no chip.
 class SensorsConfiguration {
 public:
     // Throws std::runtime_error naming the file that cannot be read.

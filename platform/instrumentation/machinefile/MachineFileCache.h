@@ -13,8 +13,8 @@
 
 namespace Vorn {
 
-// Keeps what model files hold for as long as they do not change. Thread-safe; files are read
-// outside the lock.
+// Caches the nodes of model files until the files change. Thread-safe; files are read outside the
+// lock.
 class MachineFileCache {
 public:
     // Returns the cache of this process.

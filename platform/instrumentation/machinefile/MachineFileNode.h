@@ -8,7 +8,7 @@
 
 namespace Vorn {
 
-// One sensor of a described machine, as a model file states it.
+// One sensor in a model file.
 struct MachineFileNode {
     NodeLexicon::NodeType type{};
     std::string path;
