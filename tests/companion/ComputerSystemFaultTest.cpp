@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// What becomes of a request of ZUMLO_ComputerSystem when the broker fails it.
+// The requests of ZUMLO_ComputerSystem when calls of the broker fail.
 
 #include "tests/companion/Factory.h"
 #include "tests/support/FaultSweep.h"
@@ -16,7 +16,7 @@ constexpr const char* Class = "ZUMLO_ComputerSystem";
 
 enum class Operation { names, instances, oneInstance };
 
-// One request with a broker of its own choosing, and all that came of it.
+// Sends one request with a faulty broker, and holds its result and status.
 class FaultyRequest {
 public:
     FaultyRequest(const Host::Broker& broker, FaultyBroker& faulty, Operation operation)
@@ -128,7 +128,7 @@ TEST(ComputerSystemFaultTest, AnArrayThatCannotBeMadeLeavesItsPropertyOut)
     EXPECT_EQ(Testing::property(*request.answer.instances()[0], "EnabledState"), "uint16 2");
 }
 
-// AddressSanitizer watches how far each is read.
+// The faulty broker reads whole values, so that AddressSanitizer reports one that is shorter.
 TEST(ComputerSystemFaultTest, EveryValueIsWhole)
 {
     const Host::Broker broker;

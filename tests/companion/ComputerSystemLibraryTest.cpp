@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The library as a file: what it exports, and that it leaves memory without a trace.
+// The exports of the library, and its unloading.
 
 #include "host/broker/Broker.h"
 #include "host/broker/CollectedResult.h"

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The requests of ZUMLO_ComputerSystem, from the object manager's side.
+// The requests of ZUMLO_ComputerSystem, as an object manager sends them.
 
 #include "tests/companion/Factory.h"
 #include "tests/support/ProviderTest.h"
@@ -153,7 +153,7 @@ TEST_F(ComputerSystemProviderTest, TheFactoryRefusesToWorkWithoutABroker)
     CMPIStatus status{};
     EXPECT_EQ(ComputerSystemProvider_Create_InstanceMI(nullptr, nullptr, &status), nullptr);
     EXPECT_EQ(status.rc, CMPI_RC_ERR_INVALID_PARAMETER);
-    expectFound(get(path(Class, keys()))); // with the broker of before
+    expectFound(get(path(Class, keys()))); // with the former broker
 }
 
 } // namespace ComputerSystemProviderTests

@@ -87,7 +87,7 @@ protected:
         succeeding(runAsTyped(words));
     }
 
-    // Returns and forgets the calls of the stand-ins.
+    // Returns the calls of the stand-ins and clears their record.
     Lines calls() const
     {
         Lines lines = linesOf(contentOf(path("calls")));
