@@ -151,13 +151,13 @@ attempt() {
 }
 
 # Runs the function in copies of the staging folder and of the registration folder, from which
-# sfcbrepos takes over instances.
+# sfcbrepos takes over instances. Links are not copied, but what they refer to.
 try_in_copy() {
   local original=$stage repository=${repository_options[1]-}
   local stage=$work/stage repository_options=(-r "$work/registration")
   "$is_dry_run" && return
-  cp -a "$original" "$stage"
-  [ ! -d "$repository" ] || cp -a "$repository" "$work/registration"
+  attempt cp -rL "$original" "$stage"
+  [ ! -d "$repository" ] || attempt cp -rL "$repository" "$work/registration"
   "$1" attempt
 }
 

@@ -149,6 +149,17 @@ TEST_F(ConfiguredSfcbTest, TakesTheFoldersThatAreNamed)
                                        path("own/registration") + " -f\n")));
 }
 
+TEST_F(ConfiguredSfcbTest, ChangesNothingInAStagingFolderThatIsALink)
+{
+    configure("etc/sfcb/sfcb.cfg", path("own/registration"));
+    fs::remove_all(path("own/stage"));
+    fs::create_directory_symlink(path("stage"), path("own/stage"));
+    folder_.write("stage/other.mof", "");
+    fs::remove(path("CIM/CIM_Schema.mof"));
+    EXPECT_EQ(runAsTyped({"register"}).code, 1);
+    EXPECT_THAT(stage(), ElementsAre("other.mof"));
+}
+
 TEST_F(ConfiguredSfcbTest, LinksNothingWhereItLooksInTheFolderOfTheLibraries)
 {
     folder_.write("etc/sfcb/sfcb.cfg", "providerDirs: " + library() + " " + path("own/lib") + "\n");
