@@ -1,0 +1,328 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "tests/objectmanagers/Differences.h"
+
+#include "tests/support/Texts.h"
+
+#include <strings.h>
+
+#include <array>
+#include <set>
+#include <sstream>
+
+namespace Testing {
+
+namespace {
+
+using Result = std::optional<Equivalent>;
+
+constexpr const char* systemDevice = "ZUMLO_SensorSystemDevice";
+constexpr const char* elementCapabilities = "ZUMLO_SensorElementCapabilities";
+
+bool isSame(const std::string& one, const std::string& other)
+{
+    return strcasecmp(one.c_str(), other.c_str()) == 0;
+}
+
+bool isOneOf(const std::string& name, std::initializer_list<const char*> names)
+{
+    for (const char* each : names)
+        if (isSame(name, each))
+            return true;
+    return false;
+}
+
+bool isSystemDevice(const Request& request)
+{
+    return isOneOf(request.association, {systemDevice, "CIM_SystemDevice", "CIM_Component"});
+}
+
+bool isElementCapabilities(const Request& request)
+{
+    return isOneOf(request.association, {elementCapabilities, "CIM_ElementCapabilities"});
+}
+
+bool isFrom(const Request& request, const char* className)
+{
+    return request.object.starts_with(className + std::string("."));
+}
+
+bool isFromSystem(const Request& request)
+{
+    return isFrom(request, "ZUMLO_ComputerSystem");
+}
+
+bool isFromCapabilities(const Request& request)
+{
+    return isFrom(request, "ZUMLO_SensorEnabledLogicalElementCapabilities");
+}
+
+bool isFromSensor(const Request& request)
+{
+    return isFrom(request, "ZUMLO_NumericSensor");
+}
+
+bool isOnAssociations(const Request& request)
+{
+    return request.isAssociators() || request.isReferences();
+}
+
+// ---- Both
+
+Result withoutRoles(const Request& request)
+{
+    if (request.role.empty() && request.resultRole.empty())
+        return std::nullopt;
+    Request other = request;
+    other.role = other.resultRole = "";
+    return Equivalent{.requests = {other}};
+}
+
+bool hasKnownResultClass(const Request& request)
+{
+    return !request.resultClass.empty() && request.resultClass != "No_Class";
+}
+
+Result askingEach(const Request& request)
+{
+    if (!request.isAssociators() || !request.association.empty() || !hasKnownResultClass(request))
+        return std::nullopt;
+    Request one = request;
+    Request other = request;
+    one.association = systemDevice;
+    other.association = elementCapabilities;
+    return Equivalent{.requests = {one, other}};
+}
+
+Result withoutResultClass(const Request& request)
+{
+    if (!isElementCapabilities(request) || !hasKnownResultClass(request))
+        return std::nullopt;
+    Request other = request;
+    other.resultClass = "";
+    return Equivalent{.requests = {other}};
+}
+
+Result withExactResultClass(const Request& request)
+{
+    if (!isSystemDevice(request) || !hasKnownResultClass(request) ||
+        isOneOf(request.resultClass, {"ZUMLO_NumericSensor", "ZUMLO_ComputerSystem"}))
+        return std::nullopt;
+    return Equivalent{};
+}
+
+std::string classOf(const std::string& path)
+{
+    const std::string local = path.substr(path.starts_with("root/cimv2:") ? 11 : 0);
+    return local.substr(0, local.find('.'));
+}
+
+std::vector<std::string> namesIn(const std::string& list)
+{
+    std::vector<std::string> names;
+    std::istringstream stream(list);
+    for (std::string name; std::getline(stream, name, ',');)
+        names.push_back(name);
+    return names;
+}
+
+bool isWanted(const Request& request, const std::string& property)
+{
+    const std::vector<std::string> names = namesIn(request.properties);
+    return names.empty() || std::any_of(names.begin(), names.end(),
+                                [&](const std::string& name) { return isSame(name, property); });
+}
+
+void addUnset(const Request& request, const Declarations& declarations, Answer& answer)
+{
+    if (request.operation.ends_with('n'))
+        return;
+    for (auto& [path, properties] : answer.objects)
+        for (const auto& [name, value] : declarations.at(classOf(path)))
+            if (isWanted(request, name))
+                properties.emplace(name, value);
+}
+
+// The sensors' provider compares names as they are written.
+void dropOtherSpellings(const Request& request, const Declarations&, Answer& answer)
+{
+    const std::vector<std::string> names = namesIn(request.properties);
+    for (auto& [path, properties] : answer.objects)
+        if (classOf(path) == "ZUMLO_NumericSensor" && !names.empty())
+            for (auto& [name, value] : properties)
+                if (std::find(names.begin(), names.end(), name) == names.end())
+                    value.reset();
+}
+
+// ---- OpenPegasus
+
+Result refusingUnknownClasses(const Request& request)
+{
+    if (isOnAssociations(request) &&
+        (request.association == "No_Class" || isFrom(request, "No_Class")))
+        return Equivalent{.error = 4};
+    return std::nullopt;
+}
+
+// ---- sfcb
+
+Result notFindingAssociations(const Request& request)
+{
+    if (request.association == "No_Class")
+        return Equivalent{.error = 6};
+    return std::nullopt;
+}
+
+Result withAnyResultClass(const Request& request)
+{
+    if (request.resultClass != "No_Class")
+        return std::nullopt;
+    Request other = request;
+    other.resultClass = systemDevice;
+    return Equivalent{.requests = {other}};
+}
+
+Result withoutPropertyList(const Request& request)
+{
+    if (!request.isReferences() || request.properties.empty())
+        return std::nullopt;
+    Request other = request;
+    other.properties = "";
+    return Equivalent{.requests = {other}};
+}
+
+Result withWholeSystems(const Request& request)
+{
+    if (!request.isAssociators() || !isFromSensor(request) || !request.association.empty() ||
+        request.properties.empty())
+        return std::nullopt;
+    Request one = request;
+    Request other = request;
+    one.association = systemDevice;
+    one.properties = "";
+    other.association = elementCapabilities;
+    return Equivalent{.requests = {one, other}};
+}
+
+Result needingTheAssociation(const Request& request)
+{
+    const bool isKnown =
+        isFromSensor(request) || (isFromCapabilities(request) && request.isAssociators());
+    if (!isOnAssociations(request) || !request.association.empty() || isKnown)
+        return std::nullopt;
+    return Equivalent{.error = 1};
+}
+
+Result needingTheExactAssociation(const Request& request)
+{
+    if (!request.isAssociators() || request.association.empty() ||
+        request.association == systemDevice || request.association == elementCapabilities)
+        return std::nullopt;
+    return Equivalent{.error = isSystemDevice(request) ? 0 : 1};
+}
+
+Result refusingOtherSources(const Request& request)
+{
+    if ((isElementCapabilities(request) && isFromSystem(request)) ||
+        (isSystemDevice(request) && request.isReferences() && isFromCapabilities(request)))
+        return Equivalent{.error = 1};
+    return std::nullopt;
+}
+
+Result notFindingPartialAssociations(const Request& request)
+{
+    if (request.operation != "gi" || !isFrom(request, elementCapabilities) ||
+        request.properties.empty() ||
+        (isWanted(request, "Capabilities") && isWanted(request, "ManagedElement")))
+        return std::nullopt;
+    return Equivalent{.error = 6};
+}
+
+void spellAsTheClient(const Request& request, const Declarations&, Answer& answer)
+{
+    if (!request.isReferences() || request.object.find("deviceid=") == std::string::npos)
+        return;
+    Answer changed;
+    for (const auto& [path, properties] : answer.objects) {
+        Properties ends = properties;
+        for (auto& [name, end] : ends)
+            if (end)
+                end = replaced(*end, "DeviceID=", "deviceid=");
+        changed.objects.emplace(replaced(path, "DeviceID=", "deviceid="), ends);
+    }
+    answer = changed;
+}
+
+void dropUnwantedKeys(const Request& request, const Declarations&, Answer& answer)
+{
+    if (request.operation != "ei" || request.properties.empty() ||
+        request.object != elementCapabilities)
+        return;
+    Answer changed;
+    for (const auto& [path, properties] : answer.objects) {
+        std::string keys;
+        const std::size_t second = path.find(",ManagedElement=");
+        if (isWanted(request, "Capabilities"))
+            keys += path.substr(path.find('.'), second - path.find('.'));
+        if (isWanted(request, "ManagedElement"))
+            keys += (keys.empty() ? "." : ",") + path.substr(second + 1);
+        changed.objects.emplace(elementCapabilities + keys, properties);
+    }
+    answer = changed;
+}
+
+constexpr std::array ofOpenPegasus = {
+    Difference{"code 4 for an unknown class of the association or of the source",
+        refusingUnknownClasses, nullptr},
+    Difference{"roles are not applied", withoutRoles, nullptr},
+    Difference{"without association class, each association is asked", askingEach, nullptr},
+    Difference{"ZUMLO_SensorElementCapabilities does not apply a result class", withoutResultClass,
+        nullptr},
+    Difference{"ZUMLO_SensorSystemDevice applies a result class by its exact name",
+        withExactResultClass, nullptr},
+    Difference{"property names of sensors count as they are spelt", nullptr, dropOtherSpellings},
+    Difference{"what is not set is NULL, or has the default of its class", nullptr, addUnset},
+};
+
+constexpr std::array ofSfcb = {
+    Difference{"code 6 for an unknown class of the association", notFindingAssociations, nullptr},
+    Difference{"roles are not applied", withoutRoles, nullptr},
+    Difference{
+        "an unknown result class is as good as one of other objects", withAnyResultClass, nullptr},
+    Difference{"references do not apply a property list", withoutPropertyList, nullptr},
+    Difference{
+        "systems that associators lead to do not apply a property list", withWholeSystems, nullptr},
+    Difference{"without association class, code 1 from systems and capabilities",
+        needingTheAssociation, nullptr},
+    Difference{"without association class, each association is asked", askingEach, nullptr},
+    Difference{"associators take no superclass and no other spelling of the association",
+        needingTheExactAssociation, nullptr},
+    Difference{"code 1 from a source to which the association does not refer", refusingOtherSources,
+        nullptr},
+    Difference{"ZUMLO_SensorElementCapabilities does not apply a result class", withoutResultClass,
+        nullptr},
+    Difference{"ZUMLO_SensorSystemDevice applies a result class by its exact name",
+        withExactResultClass, nullptr},
+    Difference{"ZUMLO_SensorElementCapabilities is not found by a list without both its ends",
+        notFindingPartialAssociations, nullptr},
+    Difference{
+        "references spell the keys of the source as the client does", nullptr, spellAsTheClient},
+    Difference{"ZUMLO_SensorElementCapabilities has no keys but those in the list", nullptr,
+        dropUnwantedKeys},
+    Difference{"property names of sensors count as they are spelt", nullptr, dropOtherSpellings},
+    Difference{"what is not set is NULL, or has the default of its class", nullptr, addUnset},
+};
+
+} // namespace
+
+std::span<const Difference> differencesOfOpenPegasus()
+{
+    return ofOpenPegasus;
+}
+
+std::span<const Difference> differencesOfSfcb()
+{
+    return ofSfcb;
+}
+
+} // namespace Testing

@@ -1,0 +1,95 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// Providers that OpenPegasus and sfcb unload, or whose process is killed, answer the next request
+// as before.
+
+#include "tests/objectmanagers/Agents.h"
+#include "tests/objectmanagers/Answer.h"
+#include "tests/objectmanagers/ObjectManager.h"
+#include "tests/support/WaitUntil.h"
+
+#include <gtest/gtest.h>
+
+#include <csignal>
+#include <fstream>
+
+namespace {
+
+using namespace Testing;
+
+class LifetimeTest : public testing::TestWithParam<const ObjectManager*> {
+protected:
+    void SetUp() override
+    {
+        manager_.reset();
+        if (isSfcb())
+            unloadSoon();
+        manager_.startWithProviders(
+            {{"RYNLOG_LOG", "off"}, {"VORN_INSTRUMENTATION", "model:" SENSOR_PROFILE_SOURCE_DIR
+                                                             "/schema/demo-model.json"}});
+        EXPECT_EQ(agents().size(), 0U);
+        before_ = answers();
+        EXPECT_EQ(before_.size(), 5U);
+        EXPECT_GT(agents().size(), 0U);
+    }
+    void TearDown() override { manager_.stop(); }
+
+    bool isSfcb() const { return &manager_ == &ObjectManager::sfcb(); }
+
+    // An idle provider is looked for every second and unloaded after three; the defaults are 30 and
+    // 60 seconds.
+    void unloadSoon() const
+    {
+        std::ofstream(manager_.folder() + "/etc/sfcb/sfcb.cfg", std::ios::app)
+            << "providerSampleInterval: 1\nproviderTimeoutInterval: 3\n";
+    }
+
+    std::set<::pid_t> agents() const { return agentsBelow(manager_.folder()); }
+
+    std::vector<std::string> answers() const
+    {
+        std::vector<std::string> texts;
+        for (const std::string name : {"ZUMLO_NumericSensor", "ZUMLO_ComputerSystem",
+                 "ZUMLO_SensorEnabledLogicalElementCapabilities", "ZUMLO_SensorSystemDevice",
+                 "ZUMLO_SensorElementCapabilities"})
+            texts.push_back(describe(ask({"ei", manager_.url(name)})));
+        return texts;
+    }
+
+    // Disables or enables the providers in OpenPegasus.
+    void forEachModule(const std::string& option) const
+    {
+        for (const std::string module :
+            {"SensorProfileModule", "SensorProfileComputerSystemModule"})
+            manager_.command("/opt/openpegasus/bin/cimprovider", {option, "-m", module});
+    }
+
+    const ObjectManager& manager_ = *GetParam();
+    std::vector<std::string> before_;
+};
+
+TEST_P(LifetimeTest, AnswersAgainAfterItsProcessWasKilled)
+{
+    for (const ::pid_t agent : agents())
+        EXPECT_EQ(::kill(agent, SIGKILL), 0);
+    ASSERT_TRUE(waitUntil([this] { return agents().empty(); }));
+    EXPECT_EQ(answers(), before_);
+}
+
+// OpenPegasus unloads idle providers after five to ten minutes, and disabled ones at once.
+TEST_P(LifetimeTest, AnswersAgainAfterItWasUnloaded)
+{
+    if (!isSfcb())
+        forEachModule("-d");
+    ASSERT_TRUE(waitUntil([this] { return agents().empty(); }));
+    if (!isSfcb())
+        forEachModule("-e");
+    EXPECT_EQ(answers(), before_);
+    EXPECT_GT(agents().size(), 0U);
+}
+
+INSTANTIATE_TEST_SUITE_P(ObjectManagers, LifetimeTest,
+    testing::Values(&ObjectManager::openPegasus(), &ObjectManager::sfcb()),
+    [](const auto& each) { return each.param->name(); });
+
+} // namespace

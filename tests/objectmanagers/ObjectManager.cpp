@@ -1,0 +1,85 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "tests/objectmanagers/ObjectManager.h"
+
+#include "tests/tools/ChildProcess.h"
+
+#include <stdexcept>
+#include <utility>
+
+namespace Testing {
+
+ObjectManager::ObjectManager(
+    std::string name, unsigned port, std::vector<std::string> registerOptions)
+    : name_(std::move(name)), port_(port), registerOptions_(std::move(registerOptions))
+{
+}
+
+const ObjectManager& ObjectManager::openPegasus()
+{
+    static const ObjectManager manager(
+        "openpegasus", 25988, {"--provider-folder", "/opt/openpegasus/lib"});
+    return manager;
+}
+
+const ObjectManager& ObjectManager::sfcb()
+{
+    // Its configuration, beside its commands, names its folders.
+    static const ObjectManager manager("sfcb", 15988, {});
+    return manager;
+}
+
+std::string ObjectManager::url(const std::string& object, const std::string& space) const
+{
+    return "http://127.0.0.1:" + std::to_string(port_) + '/' + space + ':' + object;
+}
+
+void ObjectManager::start(const std::map<std::string, std::string>& environment) const
+{
+    std::vector<std::string> settings = {"LC_ALL=C"};
+    for (const auto& [name, value] : environment)
+        settings.push_back(name + '=' + value);
+    command(folder_ + "/start", settings);
+}
+
+void ObjectManager::stop() const
+{
+    command(folder_ + "/stop", {});
+}
+
+void ObjectManager::reset() const
+{
+    command(folder_ + "/reset", {});
+}
+
+void ObjectManager::startWithProviders(const std::map<std::string, std::string>& environment) const
+{
+    // sfcb reads its registrations when it starts; the commands of OpenPegasus need it running.
+    if (this == &sfcb())
+        runRegister({"register"});
+    start(environment);
+    if (this == &openPegasus())
+        runRegister({"register"});
+}
+
+std::string ObjectManager::command(
+    const std::string& program, const std::vector<std::string>& arguments) const
+{
+    const Ended ended =
+        run(arguments, {.program = program,
+                           .environment = {{"PEGASUS_HOME", "/opt/openpegasus"},
+                               {"PATH", folder_ + "/bin:" + folder_ + "/sbin:/usr/bin:/bin"}}});
+    if (ended.code != 0)
+        throw std::runtime_error(program + ": " + ended.out + ended.err);
+    return ended.out;
+}
+
+std::string ObjectManager::runRegister(
+    std::vector<std::string> arguments, const std::filesystem::path& installation) const
+{
+    arguments.insert(arguments.end(), {"--object-manager", name_});
+    arguments.insert(arguments.end(), registerOptions_.begin(), registerOptions_.end());
+    return command(installation / "sbin/sensor-profile-register", arguments);
+}
+
+} // namespace Testing

@@ -1,0 +1,52 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// The object managers that a test program has for itself where in-namespaces runs it.
+
+#pragma once
+
+#include "tests/packaging/Installation.h"
+
+#include <filesystem>
+#include <map>
+#include <string>
+#include <vector>
+
+namespace Testing {
+
+// Functions that run a command throw std::runtime_error with what it printed when it fails.
+class ObjectManager {
+public:
+    static const ObjectManager& openPegasus();
+    static const ObjectManager& sfcb();
+
+    // Returns its name, as sensor-profile-register takes it.
+    const std::string& name() const { return name_; }
+    const std::string& folder() const { return folder_; }
+    std::string url(const std::string& object, const std::string& space = "root/cimv2") const;
+
+    // Starts it; its providers inherit the variables. Returns when it answers.
+    void start(const std::map<std::string, std::string>& environment) const;
+    void stop() const;
+    // Stops it and makes it what it was when it was installed.
+    void reset() const;
+    // Starts it with the providers registered.
+    void startWithProviders(const std::map<std::string, std::string>& environment) const;
+
+    // Runs one of its commands; returns what it printed.
+    std::string command(
+        const std::string& program, const std::vector<std::string>& arguments) const;
+
+    // Runs sensor-profile-register of an installation, with the folders of this object manager.
+    std::string runRegister(std::vector<std::string> arguments,
+        const std::filesystem::path& installation = movedInstallation()) const;
+
+private:
+    ObjectManager(std::string name, unsigned port, std::vector<std::string> folders);
+
+    std::string name_;
+    unsigned port_;
+    std::string folder_ = "/opt/" + name_;
+    std::vector<std::string> registerOptions_;
+};
+
+} // namespace Testing

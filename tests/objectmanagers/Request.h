@@ -1,0 +1,44 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// The requests in whose answers object managers are compared.
+
+#pragma once
+
+#include <compare>
+#include <functional>
+#include <ostream>
+#include <string>
+#include <vector>
+
+namespace Testing {
+
+// What wbemcli is given; what is empty is left out.
+struct Request {
+    std::string operation; // as wbemcli names it
+    std::string object;    // a class or a path
+    std::string association = {};
+    std::string resultClass = {};
+    std::string role = {};
+    std::string resultRole = {};
+    std::string properties = {}; // separated by commas
+
+    auto operator<=>(const Request&) const = default;
+
+    bool isAssociators() const { return operation == "ai" || operation == "ain"; }
+    bool isReferences() const { return operation == "ri" || operation == "rin"; }
+    // Returns whether it filters more than by the association.
+    bool isFiltered() const { return !(resultClass + role + resultRole + properties).empty(); }
+    // Returns wbemcli's arguments, given the URL of the object.
+    std::vector<std::string> arguments(const std::string& url) const;
+};
+
+std::ostream& operator<<(std::ostream& stream, const Request& request);
+
+// Returns the paths of a class's objects.
+using PathsOf = std::function<std::vector<std::string>(const std::string& className)>;
+
+// Returns requests for all operations that read instances: of all classes and objects, from both
+// ends of both associations, with and without each filter, and with names that fit nothing.
+std::vector<Request> allRequests(const PathsOf& pathsOf);
+
+} // namespace Testing

@@ -1,0 +1,113 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "tests/objectmanagers/Request.h"
+#include "tests/support/Texts.h"
+
+#include <utility>
+
+namespace Testing {
+
+namespace {
+
+using Texts = std::vector<std::string>;
+
+const Texts instanceClasses = {
+    "ZUMLO_NumericSensor", "ZUMLO_ComputerSystem", "ZUMLO_SensorEnabledLogicalElementCapabilities"};
+const Texts associationClasses = {"ZUMLO_SensorSystemDevice", "ZUMLO_SensorElementCapabilities"};
+const Texts enumeratedClasses = {"CIM_NumericSensor", "CIM_Sensor",
+    "CIM_EnabledLogicalElementCapabilities", "CIM_SystemDevice", "CIM_ElementCapabilities",
+    "zumlo_numericsensor", "zumlo_SENSORsystemdevice", "No_Class"};
+
+// Each is asked for alone or with others, in its own spelling or another one.
+const Texts propertyLists = {"Caption", "caption", "Status", "Name,ElementName,HealthState",
+    "InstallDate", "EnabledDefault", "UpperThresholdFatal,CurrentReading", "No_Property",
+    "CreationClassName,DeviceID"};
+const Texts endLists = {"GroupComponent", "groupcomponent", "GroupComponent,PartComponent",
+    "ManagedElement", "capabilities", "Capabilities,ManagedElement", "Characteristics",
+    "No_Property"};
+
+const Texts associations = {"", "ZUMLO_SensorSystemDevice", "ZUMLO_SensorElementCapabilities",
+    "CIM_SystemDevice", "CIM_ElementCapabilities", "CIM_Component", "zumlo_sensorsystemdevice",
+    "No_Class"};
+const Texts resultClasses = {"", "ZUMLO_NumericSensor", "ZUMLO_ComputerSystem",
+    "ZUMLO_SensorEnabledLogicalElementCapabilities", "CIM_System", "CIM_Sensor",
+    "CIM_ManagedElement", "zumlo_computersystem", "No_Class"};
+const std::vector<std::pair<std::string, std::string>> roles = {{"PartComponent", ""},
+    {"GroupComponent", ""}, {"", "PartComponent"}, {"", "Capabilities"},
+    {"managedelement", "Capabilities"}, {"PartComponent", "groupcomponent"}};
+
+void addEnumerations(std::vector<Request>& requests)
+{
+    for (const Texts& classes : {instanceClasses, associationClasses, enumeratedClasses})
+        for (const std::string& name : classes)
+            for (const std::string operation : {"ein", "ei"})
+                requests.push_back({operation, name});
+    for (const auto& [classes, lists] :
+        {std::pair(instanceClasses, propertyLists), {associationClasses, endLists}})
+        for (const std::string& name : classes)
+            for (const std::string& list : lists)
+                requests.push_back({.operation = "ei", .object = name, .properties = list});
+}
+
+void addObjects(std::vector<Request>& requests, const PathsOf& pathsOf)
+{
+    for (const auto& [classes, lists] :
+        {std::pair(instanceClasses, propertyLists), {associationClasses, endLists}})
+        for (const std::string& name : classes) {
+            const Texts paths = pathsOf(name);
+            for (const std::string& path : paths)
+                requests.push_back({"gi", path});
+            for (const std::string& list : lists)
+                requests.push_back({.operation = "gi", .object = paths.at(0), .properties = list});
+        }
+}
+
+// Paths that differ in one thing from that of a sensor.
+void addOtherPaths(std::vector<Request>& requests, const std::string& path)
+{
+    for (const auto& [from, to] : {std::pair("DeviceID=\"", "DeviceID=\"no such "),
+             {"SystemName=\"", "SystemName=\"no-such-"}, {"DeviceID=", "deviceid="},
+             {"ZUMLO_NumericSensor.", "zumlo_numericsensor."},
+             {"ZUMLO_NumericSensor.", "CIM_NumericSensor."}, {"ZUMLO_NumericSensor.", "No_Class."}})
+        for (const std::string operation : {"gi", "ai", "ain", "ri", "rin"})
+            requests.push_back({operation, replaced(path, from, to)});
+}
+
+void addFiltered(std::vector<Request>& requests, const std::string& path)
+{
+    for (const std::string& association : associations) {
+        for (const std::string operation : {"ai", "ain"}) {
+            for (const std::string& resultClass : resultClasses)
+                requests.push_back({operation, path, association, resultClass});
+            for (const auto& [role, resultRole] : roles)
+                requests.push_back({operation, path, association, "", role, resultRole});
+        }
+        for (const std::string operation : {"ri", "rin"})
+            for (const std::string role : {"", "PartComponent", "capabilities", "No_Role"})
+                requests.push_back({operation, path, association, "", role});
+    }
+    for (const std::string& list : propertyLists)
+        requests.push_back({.operation = "ai", .object = path, .properties = list});
+    for (const std::string& list : endLists)
+        requests.push_back({.operation = "ri", .object = path, .properties = list});
+}
+
+} // namespace
+
+std::vector<Request> allRequests(const PathsOf& pathsOf)
+{
+    std::vector<Request> requests;
+    addEnumerations(requests);
+    addObjects(requests, pathsOf);
+    addOtherPaths(requests, pathsOf("ZUMLO_NumericSensor").at(0));
+    for (const std::string& name : instanceClasses) {
+        const Texts paths = pathsOf(name);
+        addFiltered(requests, paths.at(0));
+        for (const std::string& path : paths)
+            for (const std::string operation : {"ai", "ain", "ri", "rin"})
+                requests.push_back({operation, path});
+    }
+    return requests;
+}
+
+} // namespace Testing
