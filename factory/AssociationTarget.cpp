@@ -6,6 +6,7 @@
 #include "factory/ClassNames.h"
 #include "factory/SensorFactory.h"
 #include "factory/TraceLines.h"
+#include "platform/utilities/ProviderUtilities.h"
 
 #include <array>
 #include <cstring>
@@ -92,7 +93,8 @@ CMPIObjectPath* SensorFactory::get_assoc_targetClass_ObjectPath(const CMPIBroker
     traced.entering(FactoryLines::targetPath.entry);
     const char* const target =
         get_assoc_targetClass_Name(broker, ref, _RefLeftClass, _RefRightClass, rc);
-    CMPIObjectPath* const path = target ? newPath(broker, ref, target, rc, rc) : nullptr;
+    CMPIObjectPath* const path =
+        target ? newPath(broker, ref, target, getSystemName(), rc, rc) : nullptr;
     traced.exiting(FactoryLines::targetPath.exit);
     return path;
 }

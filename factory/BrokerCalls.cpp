@@ -2,8 +2,6 @@
 
 #include "factory/BrokerCalls.h"
 
-#include "platform/utilities/ProviderUtilities.h"
-
 #include <cmpimacs.h>
 
 #include <cstring>
@@ -27,7 +25,7 @@ CMPIString* classNameOf(const CMPIObjectPath* path, CMPIStatus* rc)
 }
 
 CMPIObjectPath* newPath(const CMPIBroker* broker, const CMPIObjectPath* ref, const char* className,
-    CMPIStatus* rc, CMPIStatus* again)
+    const std::string& host, CMPIStatus* rc, CMPIStatus* again)
 {
     const char* const nameSpace = nameSpaceOf(ref, rc);
     if (nameSpace == nullptr || broker == nullptr)
@@ -36,7 +34,7 @@ CMPIObjectPath* newPath(const CMPIBroker* broker, const CMPIObjectPath* ref, con
     if (!isUsable(path))
         return nullptr;
     copyNameSpace(path, ref, again);
-    CMSetHostname(path, getSystemName().c_str());
+    CMSetHostname(path, host.c_str());
     return path;
 }
 

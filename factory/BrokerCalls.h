@@ -9,6 +9,8 @@
 #include <cmpidt.h>
 #include <cmpift.h>
 
+#include <string>
+
 namespace Vorn::SensorProfileProvider {
 
 // Returns whether the object is not null and has a handle.
@@ -29,10 +31,10 @@ CMPIString* classNameOf(const CMPIObjectPath* path, CMPIStatus* rc);
 // Returns whether the class name of the path is exactly this one; case matters.
 bool isOfClass(const CMPIObjectPath* path, const char* className);
 
-// Makes a path without keys, with the namespace of `ref`, the class, and this system as host.
+// Makes a path without keys, with the namespace of `ref`, the class and the host.
 // `again` is the status for setting the namespace once more. Returns null when the broker fails.
 CMPIObjectPath* newPath(const CMPIBroker* broker, const CMPIObjectPath* ref, const char* className,
-    CMPIStatus* rc, CMPIStatus* again = nullptr);
+    const std::string& host, CMPIStatus* rc, CMPIStatus* again = nullptr);
 
 // Sets the namespace of the path to that of `ref`, if there is one.
 void copyNameSpace(const CMPIObjectPath* path, const CMPIObjectPath* ref, CMPIStatus* rc);

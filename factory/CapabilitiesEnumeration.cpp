@@ -64,7 +64,7 @@ int SensorFactory::getAllSensorEnabledLogicalElementCapCMPIObjPaths(const CMPIBr
     }
     for (auto [instanceID, capabilities] : sensorEnabledLogCapMap) {
         CMPIObjectPath* const path =
-            newPath(broker, ref, SensorEnabledLogicalElementCapClass, status);
+            newPath(broker, ref, SensorEnabledLogicalElementCapClass, texts.systemName(), status);
         if (path == nullptr) {
             reportFailure(broker, status, SensorEnabledLogicalElementCapabilitiesProvider,
                 "Create CMPIObjectPath failed",

@@ -8,6 +8,7 @@
 #include "factory/PropertySelection.h"
 #include "factory/SensorFactory.h"
 #include "factory/TraceLines.h"
+#include "platform/utilities/ProviderUtilities.h"
 
 #include <cmpimacs.h>
 
@@ -23,7 +24,7 @@ CMPIInstance* newCapabilitiesInstance(
     const CMPIBroker* broker, const CMPIObjectPath* ref, const char** properties, CMPIStatus* rc)
 {
     const CMPIObjectPath* const path =
-        newPath(broker, ref, SensorEnabledLogicalElementCapClass, rc);
+        newPath(broker, ref, SensorEnabledLogicalElementCapClass, getSystemName(), rc);
     if (path == nullptr)
         return nullptr;
     CMPIInstance* const instance = CMNewInstance(broker, path, nullptr);

@@ -6,7 +6,6 @@
 #include "factory/ClassNames.h"
 #include "factory/SensorFactory.h"
 #include "factory/TraceLines.h"
-#include "platform/utilities/ProviderUtilities.h"
 
 namespace Vorn::SensorProfileProvider {
 
@@ -56,7 +55,7 @@ int SensorFactory::getAllSensorCMPIObjPaths(const CMPIBroker* broker, const CMPI
         return 1;
     }
     for (const auto& [deviceID, sensor] : sensorMap) {
-        CMPIObjectPath* const path = newPath(broker, ref, SensorClass, status);
+        CMPIObjectPath* const path = newPath(broker, ref, SensorClass, texts.systemName(), status);
         if (path == nullptr) {
             reportFailure(broker, status, SensorProfileProvider, "Create CMPIObjectPath failed.",
                 "Create CMPIObjectPath                     failed for RecordLogClass.");
@@ -66,7 +65,7 @@ int SensorFactory::getAllSensorCMPIObjPaths(const CMPIBroker* broker, const CMPI
         addTextKey(path, "CreationClassName", SensorClass);
         addTextKey(path, "DeviceID", sensor.getDeviceID().c_str());
         addTextKey(path, "SystemCreationClassName", ComputerSystemClass);
-        addTextKey(path, "SystemName", getSystemName().c_str());
+        addTextKey(path, "SystemName", texts.systemName().c_str());
         objectPaths.push_back(path);
     }
     traced.exiting();

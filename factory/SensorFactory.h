@@ -2,6 +2,7 @@
 
 #pragma once
 
+#include "factory/SensorTexts.h"
 #include "model/Sensor.h"
 #include "model/SensorEnabledLogCap.h"
 
@@ -93,6 +94,8 @@ public:
 private:
     void _createSensorMap();
     void _createEnabledLogicalElementCapMap();
+
+    const SensorTexts texts;
 
     // The records in the order of the harvest, with duplicates. The maps take over the content of
     // the records.

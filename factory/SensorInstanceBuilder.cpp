@@ -7,11 +7,8 @@
 #include "factory/InstanceWriter.h"
 #include "factory/PropertySelection.h"
 #include "factory/SensorFactory.h"
+#include "factory/SensorTexts.h"
 #include "factory/TraceLines.h"
-#include "platform/locale/FormatText.h"
-#include "platform/locale/Locale.h"
-#include "platform/locale/ResourceString.h"
-#include "platform/utilities/ProviderUtilities.h"
 
 #include <cmpimacs.h>
 
@@ -24,26 +21,12 @@ namespace {
 
 constexpr const char* operation = "makeSensorInstance";
 
-// The component number of this library in the localised texts.
-constexpr unsigned long resourceComponent = 2;
-
-// Captions and descriptions are truncated to one character less.
-constexpr std::size_t localisedTextSize = 512;
-
-std::string localised(const wchar_t* messageId, const std::string& elementName)
-{
-    const std::wstring library =
-        Locale::getResourceLibrary(resourceComponent, Locale::getLanguageId());
-    const ResourceString resource(library, messageId);
-    return make_string(formatText(resource.text(), elementName, localisedTextSize));
-}
-
 // Makes an instance with its property filter and keys. Returns what the broker returned when that
 // is not usable.
 CMPIInstance* newSensorInstance(const CMPIBroker* broker, const CMPIObjectPath* ref,
-    const Sensor& sensor, const char** properties)
+    const Sensor& sensor, const std::string& systemName, const char** properties)
 {
-    const CMPIObjectPath* const path = newPath(broker, ref, SensorClass, nullptr);
+    const CMPIObjectPath* const path = newPath(broker, ref, SensorClass, systemName, nullptr);
     if (path == nullptr)
         return nullptr;
     CMPIInstance* const instance = CMNewInstance(broker, path, nullptr);
@@ -56,7 +39,7 @@ CMPIInstance* newSensorInstance(const CMPIBroker* broker, const CMPIObjectPath* 
     writer.setText("CreationClassName", SensorClass);
     writer.setText("DeviceID", sensor.getDeviceID());
     writer.setText("SystemCreationClassName", ComputerSystemClass);
-    writer.setText("SystemName", getSystemName());
+    writer.setText("SystemName", systemName);
     return instance;
 }
 
@@ -80,9 +63,9 @@ constexpr const char* operationalStatusFailedTrace =
 // Sets the selected properties of one instance in order.
 class SensorProperties {
 public:
-    SensorProperties(Sensor& sensor, const PropertySelection& selection,
+    SensorProperties(Sensor& sensor, const SensorTexts& texts, const PropertySelection& selection,
         const InstanceWriter& writer, CMPIStatus* rc)
-        : sensor_(sensor), selection_(selection), writer_(writer), rc_(rc)
+        : sensor_(sensor), texts_(texts), selection_(selection), writer_(writer), rc_(rc)
     {
     }
 
@@ -110,9 +93,9 @@ private:
     {
         const std::string name = sensor_.getElementName();
         if (selection_.selects("Caption"))
-            writer_.setText("Caption", localised(L"MSGID_SENSOR_CAPTION", name));
+            writer_.setText("Caption", texts_.caption(name));
         if (selection_.selects("Description"))
-            writer_.setText("Description", localised(L"MSGID_SENSOR_DESCRIPTION", name));
+            writer_.setText("Description", texts_.description(name));
         setText("Name", name);
         setText("ElementName", name);
         setText("CurrentState", sensor_.getCurrentState());
@@ -184,6 +167,7 @@ private:
     }
 
     Sensor& sensor_;
+    const SensorTexts& texts_;
     const PropertySelection& selection_;
     const InstanceWriter& writer_;
     CMPIStatus* rc_;
@@ -200,10 +184,11 @@ CMPIInstance* SensorFactory::makeSensorInstance(const CMPIBroker* broker, const 
     });
     traced.entering(FactoryLines::makeSensorInstance.entry);
     const PropertySelection selection(properties, isObjPath);
-    CMPIInstance* const instance = newSensorInstance(broker, ref, snsr, properties);
+    CMPIInstance* const instance =
+        newSensorInstance(broker, ref, snsr, texts.systemName(), properties);
     if (isUsable(instance)) {
         const InstanceWriter writer(broker, instance);
-        const auto failure = SensorProperties(snsr, selection, writer, rc).set();
+        const auto failure = SensorProperties(snsr, texts, selection, writer, rc).set();
         if (failure) {
             reportFailure(
                 broker, rc, SensorProfileProvider, failure->statusText, failure->traceText);

@@ -46,7 +46,7 @@ int addPaths(const CMPIBroker* broker, const CMPIObjectPath* ref, const char* cl
     const char* key, const std::array<const char*, 2>& names, std::vector<CMPIObjectPath*>& paths)
 {
     for (const char* const name : names) {
-        paths.push_back(newPath(broker, ref, className, nullptr));
+        paths.push_back(newPath(broker, ref, className, "host", nullptr));
         addTextKey(paths.back(), key, name);
     }
     return 0;
