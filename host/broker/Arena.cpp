@@ -27,11 +27,23 @@ std::string_view Arena::text(std::string_view characters)
 
 const String& Arena::name(std::string_view characters)
 {
+    // Objects of a class mostly have the same names in the same order.
+    Name* found = lastName_ == nullptr ? nullptr : lastName_->next;
+    if (found == nullptr || found->string->text() != characters) {
+        found = &findName(characters);
+        if (lastName_ != nullptr)
+            lastName_->next = found;
+    }
+    lastName_ = found;
+    return *found->string;
+}
+
+Arena::Name& Arena::findName(std::string_view characters)
+{
     if (const auto known = names_.find(characters); known != names_.end())
-        return *known->second;
+        return known->second;
     const String& made = String::make(*this, characters);
-    names_.emplace(*made.text(), &made);
-    return made;
+    return names_.emplace(*made.text(), Name{&made}).first->second;
 }
 
 Arena* Arena::current() noexcept

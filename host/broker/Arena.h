@@ -64,9 +64,17 @@ public:
 private:
     static constexpr std::size_t firstBlock = std::size_t{16} << 10;
 
+    struct Name {
+        const String* string = nullptr;
+        Name* next = nullptr; // the name that was asked for after this one the last time
+    };
+
+    Name& findName(std::string_view characters);
+
     LargeBlocks blocks_;
     std::pmr::monotonic_buffer_resource memory_{firstBlock, &blocks_};
-    std::pmr::unordered_map<std::string_view, const String*> names_{&memory_};
+    std::pmr::unordered_map<std::string_view, Name> names_{&memory_};
+    Name* lastName_ = nullptr;
 };
 
 } // namespace Host

@@ -36,10 +36,12 @@ void Array::set(CMPICount position, const Value& value)
 
 Array& Array::copiedTo(Arena& arena) const
 {
-    Array& copy = make(arena, type_, static_cast<CMPICount>(elements_.size()));
-    std::transform(elements_.begin(), elements_.end(), copy.elements_.begin(),
-        [&arena](const Value& value) { return value.copiedTo(arena); });
-    return copy;
+    const std::span copies(arena.makeArray<Value>(elements_.size()), elements_.size());
+    std::copy(elements_.begin(), elements_.end(), copies.begin());
+    if (type_ == CMPI_ref || type_ == CMPI_instance)
+        for (Value& element : copies)
+            element = element.copiedTo(arena);
+    return arena.make<Array>(type_, copies);
 }
 
 void Array::setElementAt(CMPICount position, const CMPIValue* value, CMPIType type)

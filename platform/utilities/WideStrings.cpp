@@ -14,7 +14,10 @@ std::string make_string(const std::wstring& text)
     std::string narrow;
     narrow.reserve(text.size());
     for (const wchar_t character : text)
-        Text::appendUtf8(narrow, static_cast<char32_t>(character));
+        if (character >= 0 && character < 0x80) // nearly all are, and this takes a fraction
+            narrow += static_cast<char>(character);
+        else
+            Text::appendUtf8(narrow, static_cast<char32_t>(character));
     return narrow;
 }
 
