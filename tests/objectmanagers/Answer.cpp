@@ -106,15 +106,17 @@ Answer ask(const std::vector<std::string>& arguments)
     std::vector<std::string> words = {"-dx"};
     words.insert(words.end(), arguments.begin(), arguments.end());
     const Ended ended = run(words, {.program = "/usr/bin/wbemcli"});
+    // Before it invokes a method, wbemcli asks for the class.
     const std::string before = "From server: <?xml";
-    const std::size_t begin = ended.err.find(before);
+    const std::size_t begin = ended.err.rfind(before);
     const std::size_t end = ended.err.find("</CIM>", begin);
     if (begin == std::string::npos || end == std::string::npos)
         throw std::runtime_error("no answer: " + ended.out + ended.err);
     const std::size_t xml = begin + before.size() - 5;
     const Element document =
         Host::CimXml::readDocument(std::string_view(ended.err).substr(xml, end + 6 - xml));
-    const Element& response = document.children().at(0).children().at(0).child({"IMETHODRESPONSE"});
+    const Element& response =
+        document.children().at(0).children().at(0).child({"IMETHODRESPONSE", "METHODRESPONSE"});
     Answer answer;
     for (const Element& result : response.children())
         if (result.is("ERROR"))

@@ -139,8 +139,8 @@ void addUnset(const Request& request, const Declarations& declarations, Answer& 
         return;
     for (auto& [path, properties] : answer.objects)
         for (const auto& [name, value] : declarations.at(classOf(path)))
-            if (isWanted(request, name))
-                properties.emplace(name, value);
+            if (isWanted(request, name) && !properties[name])
+                properties[name] = value;
 }
 
 // The sensors' provider compares names as they are written.
@@ -171,6 +171,13 @@ Result notFindingAssociations(const Request& request)
     if (request.association == "No_Class")
         return Equivalent{.error = 6};
     return std::nullopt;
+}
+
+Result withoutMethods(const Request& request)
+{
+    if (request.operation != "cm" || isFrom(request, "No_Class"))
+        return std::nullopt;
+    return Equivalent{.error = 1};
 }
 
 Result withAnyResultClass(const Request& request)
@@ -287,6 +294,7 @@ constexpr std::array ofOpenPegasus = {
 constexpr std::array ofSfcb = {
     Difference{"code 6 for an unknown class of the association", notFindingAssociations, nullptr},
     Difference{"roles are not applied", withoutRoles, nullptr},
+    Difference{"code 1 for methods", withoutMethods, nullptr},
     Difference{
         "an unknown result class is as good as one of other objects", withAnyResultClass, nullptr},
     Difference{"references do not apply a property list", withoutPropertyList, nullptr},

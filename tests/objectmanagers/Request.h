@@ -20,7 +20,7 @@ struct Request {
     std::string resultClass = {};
     std::string role = {};
     std::string resultRole = {};
-    std::string properties = {}; // separated by commas
+    std::string properties = {}; // separated by commas; the method that is invoked
 
     auto operator<=>(const Request&) const = default;
 
@@ -37,8 +37,9 @@ std::ostream& operator<<(std::ostream& stream, const Request& request);
 // Returns the paths of a class's objects.
 using PathsOf = std::function<std::vector<std::string>(const std::string& className)>;
 
-// Returns requests for all operations that read instances: of all classes and objects, from both
-// ends of both associations, with and without each filter, and with names that fit nothing.
+// Returns requests for methods and for all operations that read instances: of all classes and
+// objects, from both ends of both associations, with and without each filter, and with names that
+// fit nothing.
 std::vector<Request> allRequests(const PathsOf& pathsOf);
 
 } // namespace Testing

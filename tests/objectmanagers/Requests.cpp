@@ -19,9 +19,9 @@ const Texts enumeratedClasses = {"CIM_NumericSensor", "CIM_Sensor",
     "zumlo_numericsensor", "zumlo_SENSORsystemdevice", "No_Class"};
 
 // Each is asked for alone or with others, in its own spelling or another one.
-const Texts propertyLists = {"Caption", "caption", "Status", "Name,ElementName,HealthState",
-    "InstallDate", "EnabledDefault", "UpperThresholdFatal,CurrentReading", "No_Property",
-    "CreationClassName,DeviceID"};
+const Texts propertyLists = {"Caption", "caption", "Status", "HealthState,Status",
+    "Name,ElementName,HealthState", "InstallDate", "EnabledDefault",
+    "UpperThresholdFatal,CurrentReading", "No_Property", "CreationClassName,DeviceID"};
 const Texts endLists = {"GroupComponent", "groupcomponent", "GroupComponent,PartComponent",
     "ManagedElement", "capabilities", "Capabilities,ManagedElement", "Characteristics",
     "No_Property"};
@@ -73,6 +73,13 @@ void addOtherPaths(std::vector<Request>& requests, const std::string& path)
             requests.push_back({operation, replaced(path, from, to)});
 }
 
+// No class offers a method.
+void addMethods(std::vector<Request>& requests, const std::string& path)
+{
+    for (const std::string method : {"RequestStateChange", "No_Method"})
+        requests.push_back({.operation = "cm", .object = path, .properties = method});
+}
+
 void addFiltered(std::vector<Request>& requests, const std::string& path)
 {
     for (const std::string& association : associations) {
@@ -99,9 +106,11 @@ std::vector<Request> allRequests(const PathsOf& pathsOf)
     std::vector<Request> requests;
     addEnumerations(requests);
     addObjects(requests, pathsOf);
+    addMethods(requests, "No_Class.Key=\"1\"");
     addOtherPaths(requests, pathsOf("ZUMLO_NumericSensor").at(0));
     for (const std::string& name : instanceClasses) {
         const Texts paths = pathsOf(name);
+        addMethods(requests, paths.at(0));
         addFiltered(requests, paths.at(0));
         for (const std::string& path : paths)
             for (const std::string operation : {"ai", "ain", "ri", "rin"})
