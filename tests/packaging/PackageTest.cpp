@@ -103,7 +103,7 @@ TEST(ScriptsTest, AreFreeOfWarnings)
 {
     const std::string complaints = outputOf(
         "cd '" SENSOR_PROFILE_SOURCE_DIR "' && "
-        "grep -rlE --exclude-dir=build --exclude-dir=.git '^#!/(usr/)?bin/(env bash|sh)' . | "
+        "grep -rlE --exclude-dir=build --exclude-dir=.git '^#!/(usr/)?bin/(env bash|bash|sh)' . | "
         "xargs shellcheck scripts/packages.sh packaging/sensorctl.bash packaging/register/*.sh "
         "2>&1 && echo passed");
     EXPECT_EQ(complaints, "passed\n");
