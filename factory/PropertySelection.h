@@ -2,8 +2,7 @@
 
 #pragma once
 
-#include <set>
-#include <string>
+#include <cstring>
 
 namespace Vorn::SensorProfileProvider {
 
@@ -11,19 +10,24 @@ namespace Vorn::SensorProfileProvider {
 // list (case matters); without a list all, or none when only an object path is needed.
 class PropertySelection {
 public:
-    // `properties` is null or ends with a null entry.
+    // `properties` is null or ends with a null entry; it must outlive the selection.
     PropertySelection(const char** properties, bool isObjPath)
-        : all_(properties == nullptr && !isObjPath)
+        : properties_(properties), all_(properties == nullptr && !isObjPath)
     {
-        for (; properties != nullptr && *properties != nullptr; ++properties)
-            names_.insert(*properties);
     }
 
-    bool selects(const char* name) const { return all_ || names_.contains(name); }
+    // A list is searched from its start: it has few names, and a selection serves one instance.
+    bool selects(const char* name) const
+    {
+        for (const char** listed = properties_; listed != nullptr && *listed != nullptr; ++listed)
+            if (**listed == *name && std::strcmp(*listed, name) == 0)
+                return true;
+        return all_;
+    }
 
 private:
+    const char** properties_;
     bool all_;
-    std::set<std::string, std::less<>> names_;
 };
 
 } // namespace Vorn::SensorProfileProvider

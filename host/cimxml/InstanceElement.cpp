@@ -3,12 +3,15 @@
 #include "host/cimxml/InstanceElement.h"
 
 #include "host/broker/Array.h"
+#include "host/broker/Names.h"
 #include "host/broker/String.h"
 #include "host/broker/Types.h"
 #include "host/cimxml/Literal.h"
 #include "host/cimxml/Markup.h"
 #include "host/cimxml/PathElement.h"
 #include "host/cimxml/QualifierElement.h"
+
+#include <algorithm>
 
 namespace Host::CimXml {
 
@@ -85,9 +88,9 @@ void InstanceMarkup::write(
     std::string& out, const Instance& instance, const ClassDeclaration* declared)
 {
     if (declared != declared_)
-        frames_.clear();
-    declared_ = declared;
+        useClass(declared);
     next_ = 0;
+    isWritten_.assign(listed_.size(), false);
     Markup element(out, "INSTANCE");
     element.attribute("CLASSNAME", instance.className());
     if (declared != nullptr)
@@ -102,11 +105,23 @@ void InstanceMarkup::write(
         else
             writeValue(out, value);
         out.append(frame.text, frame.valueAt);
+        if (frame.listedAt < listed_.size())
+            isWritten_[frame.listedAt] = true;
     }
+    for (std::size_t i = 0; i < listed_.size(); ++i)
+        if (!isWritten_[i])
+            out += frameFor(listed_[i], Value()).text;
+}
+
+void InstanceMarkup::useClass(const ClassDeclaration* declared)
+{
+    declared_ = declared;
+    frames_.clear();
+    listed_.clear();
     if (selection_.writesNulls && declared != nullptr)
         for (const auto& property : declared->properties)
-            if (instance.property(property->name) == nullptr)
-                out += frameFor(property->name, Value()).text;
+            if (isSelected(selection_, declared, property->name))
+                listed_.push_back(property->name);
 }
 
 // Instances of a class mostly have the same properties in the same order.
@@ -119,8 +134,10 @@ const InstanceMarkup::Frame& InstanceMarkup::frameFor(std::string_view property,
             next.property == property)
             return next;
     }
-    Frame& frame =
-        frames_.emplace_back(Frame{std::string(property), value.type(), isSingle(value), {}, 0});
+    const auto listed = std::find_if(listed_.begin(), listed_.end(),
+        [property](std::string_view name) { return equalNames(name, property); });
+    Frame& frame = frames_.emplace_back(Frame{std::string(property), value.type(), isSingle(value),
+        {}, 0, static_cast<std::size_t>(listed - listed_.begin())});
     if (isSelected(selection_, declared_, property))
         frame.valueAt = writeFrame(
             frame.text, property, frame.valueType, frame.isSingle, declared_, selection_);

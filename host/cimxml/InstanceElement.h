@@ -39,14 +39,20 @@ private:
         bool isSingle = false; // the value is the content of one VALUE
         std::string text;      // empty when the property is not selected
         std::size_t valueAt = 0;
+        std::size_t listedAt = 0; // in listed_; its size where the property is not in it
     };
 
+    void useClass(const ClassDeclaration* declared);
     const Frame& frameFor(std::string_view property, const Value& value);
 
     ObjectSelection selection_;
     const ClassDeclaration* declared_ = nullptr;
     std::vector<Frame> frames_; // of that class
     std::size_t next_ = 0;      // where the search begins
+
+    // The properties of the class that are nulls where an instance lacks them.
+    std::vector<std::string_view> listed_;
+    std::vector<bool> isWritten_; // of these, in the present instance
 };
 
 } // namespace Host::CimXml
