@@ -7,6 +7,7 @@
 
 #include "bench/ModelMachine.h"
 #include "bench/ServerProcess.h"
+#include "bench/Skim.h"
 #include "host/broker/Broker.h"
 #include "host/broker/CollectedResult.h"
 #include "host/broker/ObjectPath.h"
@@ -31,6 +32,7 @@ namespace {
 
 using Bench::ModelMachine;
 using Bench::ServerProcess;
+using Bench::skim;
 using Testing::HttpClient;
 using Clock = std::chrono::steady_clock;
 using Milliseconds = std::chrono::duration<double, std::milli>;
@@ -66,27 +68,6 @@ void check(const Testing::HttpReply& reply, std::int64_t instances)
         ++found;
     if (found != instances)
         throw std::runtime_error("a request failed: " + reply.body.substr(0, 500));
-}
-
-// Reads an answer to its end without keeping it, since the client's work is not to be measured.
-// Returns the number of bytes.
-std::size_t skim(HttpClient& client)
-{
-    std::string last = client.receiveSome();
-    if (!last.starts_with("HTTP/1.1 200 "))
-        throw std::runtime_error("a request failed: " + last.substr(0, 500));
-    const bool isChunked = last.find("chunked") < last.find("\r\n\r\n");
-    const std::string_view end = isChunked ? "</CIM>\n\r\n0\r\n\r\n" : "</CIM>\n";
-    std::size_t count = last.size();
-    while (!last.ends_with(end)) {
-        const std::string piece = client.receiveSome();
-        if (piece.empty())
-            throw std::runtime_error("an answer broke off");
-        count += piece.size();
-        last.erase(0, last.size() - std::min(last.size(), end.size()));
-        last += piece;
-    }
-    return count;
 }
 
 struct Load {

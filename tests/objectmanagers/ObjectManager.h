@@ -22,6 +22,7 @@ public:
     // Returns its name, as sensor-profile-register takes it.
     const std::string& name() const { return name_; }
     const std::string& folder() const { return folder_; }
+    unsigned port() const { return port_; }
     std::string url(const std::string& object, const std::string& space = "root/cimv2") const;
 
     // Starts it; its providers inherit the variables. Returns when it answers.
