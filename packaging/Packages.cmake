@@ -9,7 +9,7 @@ set(CPACK_PACKAGE_DESCRIPTION_SUMMARY "")
 set(CPACK_PACKAGE_VENDOR "The sensor-profile authors")
 set(CPACK_PACKAGE_CONTACT "The sensor-profile authors <sensor-profile@example.org>")
 # Each package is a group: a component of the installation, and the files that only this kind of
-# package has. The settings file selects the components of the kind.
+# package has. PackageKind.cmake selects those of one kind.
 set(CPACK_COMPONENTS_ALL provider provider-deb provider-rpm tool tool-deb tool-rpm)
 set(CPACK_PROJECT_CONFIG_FILE "${CMAKE_CURRENT_LIST_DIR}/PackageKind.cmake")
 set(CPACK_COMPONENTS_GROUPING ONE_PER_GROUP)
