@@ -112,7 +112,7 @@ TEST(RpmTest, OwnsItsFolders)
     const auto of = [&](const std::string& package) {
         std::vector<std::string> names;
         for (const std::string& line : query(package, folders))
-            if (line.starts_with("d") && line.find("/.build-id") == line.npos)
+            if (line.starts_with("d") && line.find("/.build-id") == std::string::npos)
                 names.push_back(line.substr(line.find(' ') + 1));
         return names;
     };
@@ -200,7 +200,7 @@ protected:
     std::vector<std::string> callsOfSystemctl() const
     {
         const fs::path file = root_.path() / "calls";
-        const std::vector<std::string> calls = linesOf(contentOf(file));
+        std::vector<std::string> calls = linesOf(contentOf(file));
         fs::remove(file);
         return calls;
     }
