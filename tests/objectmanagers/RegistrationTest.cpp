@@ -6,6 +6,8 @@
 #include "tests/objectmanagers/ObjectManager.h"
 #include "tests/support/Texts.h"
 
+#include <gtest/gtest.h>
+
 #include <fstream>
 #include <set>
 #include <sstream>
