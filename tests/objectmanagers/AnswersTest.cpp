@@ -54,6 +54,7 @@ public:
         });
         std::vector<std::future<std::vector<Answer>>> asking;
         for (Peer& peer : peers) {
+            peer.manager.reset();
             peer.manager.startWithProviders(settings_);
             peer.declarations = declarationsIn(peer.manager);
             asking.push_back(

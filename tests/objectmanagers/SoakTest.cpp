@@ -88,8 +88,10 @@ TEST(SoakTest, NothingFailsOrGrowsWhileAChipComesAndGoes)
     BoundSysfs sysfs("hotplug");
     const std::vector<const ObjectManager*> managers = {
         &ObjectManager::openPegasus(), &ObjectManager::sfcb()};
-    for (const ObjectManager* manager : managers)
+    for (const ObjectManager* manager : managers) {
+        manager->reset();
         manager->startWithProviders({{"RYNLOG_LOG", "off"}});
+    }
     const auto soak = [&](Clock::duration time) {
         const auto end = Clock::now() + time;
         Clients ofOpenPegasus(*managers[0], end);
