@@ -94,7 +94,7 @@ std::optional<double> valueOf(const Feature& feature, Subfeature type)
     if (subfeature == nullptr || sensors_get_value(feature.chip, subfeature->number, &value) < 0 ||
         !std::isfinite(value))
         return std::nullopt;
-    return value;
+    return feature.feature->type == SENSORS_FEATURE_IN ? keepingMillivolts(value) : value;
 }
 
 // Returns nothing when there is no such limit, and NaN when it cannot be read.
@@ -135,6 +135,17 @@ std::optional<double> readingOf(const Feature& feature, const Subfeatures& types
 }
 
 } // namespace
+
+double keepingMillivolts(double volts)
+{
+    const double millivolts = std::round(volts * 1000.0);
+    const bool isNearest = millivolts / 1000.0 == volts;
+    // Records multiply with this precision.
+    const bool fallsShort = std::fabs(volts * 1000.0L) < std::fabs(millivolts);
+    if (!isNearest || !fallsShort)
+        return volts;
+    return std::nextafter(volts, std::copysign(std::numeric_limits<double>::infinity(), volts));
+}
 
 Channel readChannel(const Feature& feature)
 {

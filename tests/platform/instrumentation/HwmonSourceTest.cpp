@@ -84,10 +84,10 @@ TEST_F(HwmonTest, EveryLimitBecomesItsThreshold)
 
 TEST_F(HwmonTest, TheAverageStandsInWhereThereIsNoInput)
 {
-    EXPECT_EQ(nodeOf({{"in1_average", "3300"}}).values.reading, 3.3);
-    EXPECT_EQ(nodeOf({{"in1_average", "3300"}, {"in1_input", "5000"}}).values.reading, 5.0);
+    EXPECT_EQ(nodeOf({{"in1_average", "3250"}}).values.reading, 3.25);
+    EXPECT_EQ(nodeOf({{"in1_average", "3250"}, {"in1_input", "5000"}}).values.reading, 5.0);
     EXPECT_EQ(
-        nodeOf({{"in1_average", "3300"}, {"in1_input", "none"}}).values.reading, std::nullopt);
+        nodeOf({{"in1_average", "3250"}, {"in1_input", "none"}}).values.reading, std::nullopt);
 }
 
 // libsensors opens the attribute at each reading. Its error is "Kernel interface error" where the
