@@ -2,6 +2,8 @@
 
 #include "platform/text/Escape.h"
 
+#include <algorithm>
+
 namespace Text {
 
 namespace {
@@ -26,14 +28,20 @@ bool isControl(char character)
 
 void appendEscaped(std::string& out, std::string_view text, Backslash backslash)
 {
-    for (const char character : text) {
-        if (isControl(character)) {
-            appendEscape(out, character);
-            continue;
-        }
-        if (character == '\\' && backslash == Backslash::doubled)
-            out += '\\';
-        out += character;
+    const auto isEscaped = [backslash](char character) {
+        return isControl(character) || (character == '\\' && backslash == Backslash::doubled);
+    };
+    while (!text.empty()) {
+        const auto* const escaped = std::find_if(text.begin(), text.end(), isEscaped);
+        out.append(text.begin(), escaped);
+        text.remove_prefix(static_cast<std::size_t>(escaped - text.begin()));
+        if (text.empty())
+            return;
+        if (text.front() == '\\')
+            out += "\\\\";
+        else
+            appendEscape(out, text.front());
+        text.remove_prefix(1);
     }
 }
 
