@@ -13,13 +13,6 @@ namespace Vorn::Companion {
 
 inline constexpr const char* ComputerSystemClass = "ZUMLO_ComputerSystem";
 
-// Returns whether the object is neither null nor without a handle.
-template <typename Object>
-bool isUsable(const Object* object)
-{
-    return object != nullptr && object->hdl != nullptr;
-}
-
 // Returns a path in the namespace of `ref` with this computer as host; null when the broker fails
 // to make it with its keys.
 CMPIObjectPath* makePath(

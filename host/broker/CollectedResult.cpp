@@ -14,9 +14,12 @@ void CollectedResult::append(const CollectedResult& other)
     refused_ += other.refused_;
 }
 
-void CollectedResult::keepOnly(const std::function<bool(std::string_view)>& isWanted)
+void CollectedResult::keepOnly(
+    const std::function<bool(std::string_view, std::string_view)>& isWanted)
 {
-    const auto isUnwanted = [&](const auto* object) { return !isWanted(object->className()); };
+    const auto isUnwanted = [&](const auto* object) {
+        return !isWanted(object->nameSpace(), object->className());
+    };
     std::erase_if(instances_, isUnwanted);
     std::erase_if(paths_, isUnwanted);
 }

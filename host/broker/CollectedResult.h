@@ -33,8 +33,9 @@ public:
     void close() noexcept { isDone_ = true; }
     // Adds the objects and refusals of the other one.
     void append(const CollectedResult& other);
-    // Removes the objects for whose class the predicate is false.
-    void keepOnly(const std::function<bool(std::string_view className)>& isWanted);
+    // Removes the objects for whose namespace and class the predicate is false.
+    void keepOnly(const std::function<bool(std::string_view nameSpace, std::string_view className)>&
+            isWanted);
 
 private:
     std::vector<const Instance*> instances_;

@@ -48,6 +48,11 @@ Instance& Instance::make(Arena& arena, const ObjectPath& path, const ClassInform
     return arena.make<Instance>(path.copiedTo(arena), classes);
 }
 
+std::string_view Instance::nameSpace() const noexcept
+{
+    return path_->nameSpace();
+}
+
 std::string_view Instance::className() const noexcept
 {
     return path_->className();

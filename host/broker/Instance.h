@@ -21,6 +21,7 @@ public:
     // may be null; it must outlive the instance.
     static Instance& make(Arena& arena, const ObjectPath& path, const ClassInformation* classes);
 
+    std::string_view nameSpace() const noexcept;
     std::string_view className() const noexcept;
     const NamedValues& properties() const noexcept { return properties_; }
     // Returns null when there is no such property.

@@ -161,8 +161,8 @@ CollectedResult Manager::askAssociations(const ObjectPath& source, const Associa
         CollectedResult found =
             ask(provider, *provider.associationMI, targetOf(source, routing_.classNameOf(source)));
         if (resultClass != nullptr)
-            found.keepOnly([&](std::string_view className) {
-                return routing_.isA(source.nameSpace(), className, resultClass);
+            found.keepOnly([&](std::string_view nameSpace, std::string_view className) {
+                return routing_.isA(nameSpace, className, resultClass);
             });
         return found;
     });

@@ -20,4 +20,17 @@ std::vector<ProviderRegistration> sensorProfileProviders(
     return providers;
 }
 
+std::vector<ProviderRegistration> registeredProfileProviders(
+    const std::string& sensorLibrary, const std::optional<std::string>& computerSystemLibrary)
+{
+    auto providers = sensorProfileProviders(sensorLibrary, computerSystemLibrary);
+    if (computerSystemLibrary) {
+        providers.push_back({"ZUMLO_SensorRegisteredProfile", "SensorRegisteredProfileProvider",
+            *computerSystemLibrary});
+        providers.push_back({"ZUMLO_SensorElementConformsToProfile",
+            "SensorElementConformsToProfileProvider", *computerSystemLibrary, true});
+    }
+    return providers;
+}
+
 } // namespace Host

@@ -12,9 +12,15 @@
 
 namespace Host {
 
-// Library files with their folders. Without the second one no provider serves
-// ZUMLO_ComputerSystem.
+// Both functions take library files with their folders. Without the second one no provider serves
+// ZUMLO_ComputerSystem and the registration of the profile.
+
+// Returns the providers of the sensors, their computer system and their capabilities.
 std::vector<ProviderRegistration> sensorProfileProviders(
+    const std::string& sensorLibrary, const std::optional<std::string>& computerSystemLibrary);
+
+// Returns these and the providers of the profile's registration, which need root/interop.
+std::vector<ProviderRegistration> registeredProfileProviders(
     const std::string& sensorLibrary, const std::optional<std::string>& computerSystemLibrary);
 
 } // namespace Host

@@ -15,18 +15,11 @@ namespace {
 constexpr const char* systemClass = "ZUMLO_ComputerSystem";
 constexpr const char* objectManagerName = "sensor-profile";
 
-// The profile of sensors, DSP1009, in the version that the served classes follow.
-constexpr const char* profileId = "ZUMLO:DSP1009";
-constexpr const char* profileName = "Sensors";
-constexpr const char* profileVersion = "1.0.2";
-
 // Codes of the DMTF value maps.
 constexpr unsigned enabled = 2;        // CIM_EnabledLogicalElement.EnabledState
 constexpr unsigned notApplicable = 12; // .RequestedState: nobody can request one here
 constexpr unsigned healthy = 5;        // CIM_ManagedSystemElement.HealthState
 constexpr unsigned ok = 2;             // .OperationalStatus
-constexpr unsigned dmtf = 2;           // CIM_RegisteredProfile.RegisteredOrganization
-constexpr unsigned notAdvertised = 2;  // .AdvertiseTypes
 
 Value code(unsigned number)
 {
@@ -41,7 +34,6 @@ InteropObjects::InteropObjects(const Repository& classes, const std::string& hos
     addObjectManager(hostName);
     for (const auto& each : classes.namespaces())
         addNamespace(hostName, each->name());
-    addProfile();
 }
 
 std::vector<const Instance*> InteropObjects::ofClass(std::string_view className) const
@@ -81,17 +73,6 @@ void InteropObjects::addNamespace(const std::string& hostName, const std::string
     setText(nameSpace, "CreationClassName", namespaceClass);
     setText(nameSpace, "Name", name);
     setText(nameSpace, "ElementName", name);
-}
-
-void InteropObjects::addProfile()
-{
-    Instance& profile = add(registeredProfileClass);
-    setText(profile, "InstanceID", profileId);
-    setText(profile, "ElementName", profileName);
-    profile.setProperty("RegisteredOrganization", code(dmtf));
-    setText(profile, "RegisteredName", profileName);
-    setText(profile, "RegisteredVersion", profileVersion);
-    setCodes(profile, "AdvertiseTypes", notAdvertised);
 }
 
 Instance& InteropObjects::add(const char* className)

@@ -1,7 +1,7 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The objects of root/interop, in which the object manager describes itself to clients: its
-// namespaces, itself and the profile it implements.
+// The objects of root/interop in which the object manager describes itself to clients: its
+// namespaces and itself.
 
 #pragma once
 
@@ -19,7 +19,6 @@ class Repository;
 inline constexpr const char* interopNameSpace = "root/interop";
 inline constexpr const char* namespaceClass = "CIM_Namespace";
 inline constexpr const char* objectManagerClass = "CIM_ObjectManager";
-inline constexpr const char* registeredProfileClass = "CIM_RegisteredProfile";
 
 // A snapshot of the objects.
 class InteropObjects {
@@ -33,7 +32,6 @@ public:
 private:
     void addObjectManager(const std::string& hostName);
     void addNamespace(const std::string& hostName, const std::string& name);
-    void addProfile();
     Instance& add(const char* className);
     void setText(Instance& instance, const char* name, std::string_view text);
     void setCodes(Instance& instance, const char* name, unsigned only);

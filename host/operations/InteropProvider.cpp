@@ -89,7 +89,7 @@ InteropProvider::InteropProvider(const Repository& classes, HostName hostName)
 std::vector<ProviderRegistration> InteropProvider::registrations()
 {
     std::vector<ProviderRegistration> all;
-    for (const char* const className : {objectManagerClass, namespaceClass, registeredProfileClass})
+    for (const char* const className : {objectManagerClass, namespaceClass})
         all.push_back({.className = className,
             .providerName = interopProviderName,
             .libraryFile = {},

@@ -40,20 +40,22 @@ struct NameOrder {
 
 // Returns the names as the first class with such a property spells them, since providers may
 // compare letter case. Names that no class has are left out, and repeated names occur once: a
-// client's list may be as long as a request, and each instance is compared with it.
+// client's list may be as long as a request, and each instance is compared with it. All namespaces
+// count, since associations lead from one to another.
 std::vector<std::string> spelledAsDeclared(
-    const Namespace& nameSpace, const std::vector<std::string>& names)
+    const Repository& classes, const std::vector<std::string>& names)
 {
     std::set<std::string_view, NameOrder> wanted(names.begin(), names.end());
     std::vector<std::string> spelled;
-    for (const auto& declared : nameSpace.classes()) {
-        if (wanted.empty())
-            break;
-        for (const auto& property : declared->properties)
-            // Inherited ones were seen already: classes come after those above them.
-            if (property->declaredIn == declared.get() && wanted.erase(property->name) != 0)
-                spelled.push_back(property->name);
-    }
+    for (const auto& nameSpace : classes.namespaces())
+        for (const auto& declared : nameSpace->classes()) {
+            if (wanted.empty())
+                return spelled;
+            for (const auto& property : declared->properties)
+                // Inherited ones were seen already: classes come after those above them.
+                if (property->declaredIn == declared.get() && wanted.erase(property->name) != 0)
+                    spelled.push_back(property->name);
+        }
     // Providers may treat an empty list as no list and return all properties.
     if (spelled.empty() && !names.empty())
         spelled.push_back(names.front());
@@ -78,8 +80,7 @@ ObjectSelection effectiveSelection(const Operation& operation, const Repository&
     if (!isOfClasses(operation.kind))
         selection.localOnly = false;
     if (selection.properties) {
-        selection.properties =
-            spelledAsDeclared(*classes.findNamespace(operation.nameSpace), *selection.properties);
+        selection.properties = spelledAsDeclared(classes, *selection.properties);
         selection.writesNulls = true;
     }
     if (leavesOutSubclasses(operation)) {

@@ -18,10 +18,13 @@ namespace ComputerSystemLibraryTests {
 
 const std::string library = SENSOR_PROFILE_BINARY_DIR "/lib/libSensorProfileComputerSystem.so";
 
-TEST(ComputerSystemLibraryTest, ExportsItsFactoryAndNothingElse)
+TEST(ComputerSystemLibraryTest, ExportsItsFactoriesAndNothingElse)
 {
     EXPECT_THAT(Testing::exportedNames(library),
-        testing::ElementsAre("ComputerSystemProvider_Create_InstanceMI"));
+        testing::UnorderedElementsAre("ComputerSystemProvider_Create_InstanceMI",
+            "SensorElementConformsToProfileProvider_Create_AssociationMI",
+            "SensorElementConformsToProfileProvider_Create_InstanceMI",
+            "SensorRegisteredProfileProvider_Create_InstanceMI"));
 }
 
 TEST(ComputerSystemLibraryTest, IsUsedAndUnloadedOverAndOver)

@@ -171,8 +171,8 @@ public:
         const auto classes = compileClasses();
         const ProviderFiles files = source_.providerFiles();
         Host::ObjectManager objects(*classes,
-            Host::sensorProfileProviders(files.sensors, files.computerSystem), Vorn::getSystemName,
-            options_.operations);
+            Host::registeredProfileProviders(files.sensors, files.computerSystem),
+            Vorn::getSystemName, options_.operations);
         MemoryReturn operations(objects);
         beginLog(renounceRoot(options_.user), out);
         for (const std::string& file : modelFiles())

@@ -19,15 +19,14 @@
 namespace {
 
 using testing::ElementsAre;
-using testing::UnorderedElementsAre;
 
 class InteropProviderTest : public testing::Test {
 protected:
-    // Returns the names of the properties of the only profile.
-    std::vector<std::string> profile(const char** properties)
+    // Returns the names of the properties of the only object manager.
+    std::vector<std::string> objectManager(const char** properties)
     {
         const auto answer = manager_.enumerateInstances(request_.context(),
-            request_.makePath(Host::interopNameSpace, Host::registeredProfileClass), properties);
+            request_.makePath(Host::interopNameSpace, Host::objectManagerClass), properties);
         EXPECT_EQ(answer.instances().size(), 1U);
         std::vector<std::string> names;
         for (const Host::NamedValue& property : answer.instances().at(0)->properties())
@@ -46,10 +45,16 @@ protected:
         }
     }
 
-    Host::ObjectPath& profilePath(const char* key, std::string_view value)
+    Host::ObjectPath& objectManagerPath(const char* key, std::string_view name)
     {
-        auto& path = request_.makePath(Host::interopNameSpace, Host::registeredProfileClass);
-        path.addKey(key, Host::Value::text(request_.arena(), value));
+        auto& path = request_.makePath(Host::interopNameSpace, Host::objectManagerClass);
+        const auto addKey = [&](const char* keyName, std::string_view text) {
+            path.addKey(keyName, Host::Value::text(request_.arena(), text));
+        };
+        addKey("SystemCreationClassName", "ZUMLO_ComputerSystem");
+        addKey("SystemName", hostName_);
+        addKey("CreationClassName", Host::objectManagerClass);
+        addKey(key, name);
         return path;
     }
 
@@ -62,26 +67,26 @@ protected:
 
 TEST_F(InteropProviderTest, AListLeavesOutAllButTheKeysAndWhatItNames)
 {
-    const char* list[] = {"registeredname", "Unheard", nullptr};
-    EXPECT_THAT(profile(list), ElementsAre("InstanceID", "RegisteredName"));
+    const char* list[] = {"healthstate", "Unheard", nullptr};
+    EXPECT_THAT(objectManager(list), ElementsAre("SystemCreationClassName", "SystemName",
+                                         "CreationClassName", "Name", "HealthState"));
     const char* nothing[] = {nullptr};
-    EXPECT_THAT(profile(nothing), ElementsAre("InstanceID"));
+    EXPECT_THAT(objectManager(nothing),
+        ElementsAre("SystemCreationClassName", "SystemName", "CreationClassName", "Name"));
 }
 
 TEST_F(InteropProviderTest, WhatOneAskedForLeavesTheObjectsAsTheyAre)
 {
     const char* nothing[] = {nullptr};
-    profile(nothing);
-    EXPECT_THAT(profile(nullptr),
-        UnorderedElementsAre("InstanceID", "ElementName", "RegisteredOrganization",
-            "RegisteredName", "RegisteredVersion", "AdvertiseTypes"));
+    objectManager(nothing);
+    EXPECT_EQ(objectManager(nullptr).size(), 13U);
 }
 
 TEST_F(InteropProviderTest, AnObjectIsFoundByAllItsKeys)
 {
-    EXPECT_TRUE(isFound(profilePath("INSTANCEID", "ZUMLO:DSP1009")));
-    EXPECT_FALSE(isFound(profilePath("InstanceID", "zumlo:dsp1009")));
-    EXPECT_FALSE(isFound(request_.makePath(Host::interopNameSpace, Host::registeredProfileClass)));
+    EXPECT_TRUE(isFound(objectManagerPath("NAME", "sensor-profile")));
+    EXPECT_FALSE(isFound(objectManagerPath("Name", "Sensor-Profile")));
+    EXPECT_FALSE(isFound(request_.makePath(Host::interopNameSpace, Host::objectManagerClass)));
     EXPECT_FALSE(isFound(request_.makePath(Host::interopNameSpace, Host::namespaceClass)));
 }
 
@@ -112,7 +117,7 @@ TEST_F(InteropProviderTest, EveryPropertyIsDeclaredWithItsType)
 {
     const auto answer = manager_.enumerateInstances(request_.context(),
         request_.makePath(Host::interopNameSpace, "CIM_ManagedElement"), nullptr);
-    EXPECT_EQ(answer.instances().size(), 4U);
+    EXPECT_EQ(answer.instances().size(), 3U);
     for (const Host::Instance* const instance : answer.instances()) {
         const auto* const declared =
             classes_->findClass(Host::interopNameSpace, instance->className());

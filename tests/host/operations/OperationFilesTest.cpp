@@ -3,8 +3,8 @@
 // Requests in files with the expected responses, for each operation and its options.
 //
 // NAME.xml contains a request, the line `<!-- response -->` and the response with each element on a
-// line of its own. In both, @SYSTEM@ stands for the kernel's host name, @VERSION@ for the version of
-// the product, and @CONTEXT@ for the context of the open enumeration. Before a request with
+// line of its own. In both, @SYSTEM@ stands for the kernel's host name, @VERSION@ for the version
+// of the product, and @CONTEXT@ for the context of the open enumeration. Before a request with
 // `<!-- after OTHER.xml -->`, the request of that file is sent.
 
 #include "host/cimxml/OperationTable.h"

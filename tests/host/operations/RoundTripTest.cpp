@@ -47,7 +47,13 @@ class RoundTripTest : public testing::Test {
 protected:
     std::string ask(const std::string& operation, const std::string& parameters)
     {
-        const std::string answer = answerTo(*manager_, callIn(nameSpace_, operation, parameters));
+        return askIn(nameSpace_, operation, parameters);
+    }
+
+    std::string askIn(
+        const std::string& nameSpace, const std::string& operation, const std::string& parameters)
+    {
+        const std::string answer = answerTo(*manager_, callIn(nameSpace, operation, parameters));
         EXPECT_EQ(errorIn(answer), "") << operation << ' ' << parameters;
         return answer;
     }
@@ -67,11 +73,20 @@ protected:
     void expectFound(const std::string& name)
     {
         const std::string className = between(name, "CLASSNAME=\"", "\"");
-        EXPECT_EQ(countOf(ask("GetInstance", parameter("InstanceName", name)),
-                      "<INSTANCE CLASSNAME=\"" + className + "\">"),
+        EXPECT_EQ(
+            countOf(askIn(nameSpaceOf(className), "GetInstance", parameter("InstanceName", name)),
+                "<INSTANCE CLASSNAME=\"" + className + "\">"),
             1U)
             << name;
         tried_.insert(className);
+    }
+
+    // Returns the namespace of the request, unless an association can lead from it to the class.
+    std::string nameSpaceOf(const std::string& className) const
+    {
+        if (className == "ZUMLO_SensorRegisteredProfile")
+            return "root/interop";
+        return className == "ZUMLO_NumericSensor" ? "root/cimv2" : nameSpace_;
     }
 
     void followFrom(const std::string& source)
@@ -92,8 +107,8 @@ protected:
 
 TEST_F(RoundTripTest, PathsOfEnumerations)
 {
-    for (const char* const root :
-        {"CIM_ManagedElement", "CIM_Component", "CIM_ElementCapabilities"}) {
+    for (const char* const root : {"CIM_ManagedElement", "CIM_Component", "CIM_ElementCapabilities",
+             "CIM_ElementConformsToProfile"}) {
         const std::string whole = classOf("ClassName", root);
         const auto names = found("EnumerateInstanceNames", whole);
         EXPECT_EQ(found("EnumerateInstances", whole), names);
@@ -101,7 +116,7 @@ TEST_F(RoundTripTest, PathsOfEnumerations)
         EXPECT_EQ(found("OpenEnumerateInstances", atOnce), names);
         EXPECT_EQ(found("OpenEnumerateInstancePaths", atOnce), names);
     }
-    EXPECT_EQ(tried_.size(), 5U);
+    EXPECT_EQ(tried_.size(), 7U);
 }
 
 TEST_F(RoundTripTest, PathsOfWhatIsAssociated)
@@ -109,7 +124,7 @@ TEST_F(RoundTripTest, PathsOfWhatIsAssociated)
     for (const std::string& source :
         found("EnumerateInstanceNames", classOf("ClassName", "CIM_ManagedElement")))
         followFrom(source);
-    EXPECT_EQ(tried_.size(), 5U);
+    EXPECT_EQ(tried_.size(), 7U);
 }
 
 TEST_F(RoundTripTest, PathsThatArePulled)
@@ -132,6 +147,15 @@ TEST_F(RoundTripTest, PathsOfTheObjectManagerItself)
     const auto names = found("EnumerateInstanceNames", whole);
     EXPECT_EQ(names.size(), 4U);
     EXPECT_EQ(found("EnumerateInstances", whole), names);
+    EXPECT_EQ(tried_.size(), 3U);
+}
+
+TEST_F(RoundTripTest, PathsFromTheProfileToItsSensors)
+{
+    nameSpace_ = "root/interop";
+    const std::string profiles = classOf("ClassName", "CIM_RegisteredProfile");
+    for (const std::string& profile : found("EnumerateInstanceNames", profiles))
+        followFrom(profile);
     EXPECT_EQ(tried_.size(), 3U);
 }
 

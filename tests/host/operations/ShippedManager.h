@@ -17,7 +17,7 @@ public:
     explicit ShippedManager(const Host::OperationLimits& limits = {})
         : manager_(
               classes(),
-              Host::sensorProfileProviders(SENSOR_PROFILE_BINARY_DIR
+              Host::registeredProfileProviders(SENSOR_PROFILE_BINARY_DIR
                   "/lib/libSensorProfileProvider.so",
                   SENSOR_PROFILE_BINARY_DIR "/lib/libSensorProfileComputerSystem.so"),
               [] { return std::string("host.example"); }, limits)

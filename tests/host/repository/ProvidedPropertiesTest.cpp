@@ -22,22 +22,34 @@ using ::testing::UnorderedElementsAreArray;
 
 constexpr const char* Cimv2 = "root/cimv2";
 
-class ProvidedPropertiesTest : public ::testing::TestWithParam<const char*> {
+struct ProvidedClass {
+    const char* name;
+    const char* nameSpace = Cimv2;
+};
+
+void PrintTo(const ProvidedClass& provided, std::ostream* out)
+{
+    *out << provided.name;
+}
+
+class ProvidedPropertiesTest : public ::testing::TestWithParam<ProvidedClass> {
 protected:
     Testing::EnvironmentVariable machine_{
         "VORN_INSTRUMENTATION", "model:" SENSOR_PROFILE_SOURCE_DIR "/schema/demo-model.json"};
     std::unique_ptr<const Host::Repository> repository_ = Testing::shippedClasses();
-    Host::Manager manager_{*repository_,
-        Host::sensorProfileProviders(SENSOR_PROFILE_BINARY_DIR "/lib/libSensorProfileProvider.so",
-            SENSOR_PROFILE_BINARY_DIR "/lib/libSensorProfileComputerSystem.so")};
+    Host::Manager manager_{
+        *repository_, Host::registeredProfileProviders(SENSOR_PROFILE_BINARY_DIR
+                          "/lib/libSensorProfileProvider.so",
+                          SENSOR_PROFILE_BINARY_DIR "/lib/libSensorProfileComputerSystem.so")};
 };
 
 TEST_P(ProvidedPropertiesTest, AreDeclaredWithTheTypeTheyHave)
 {
-    const Host::ClassDeclaration& declared = *repository_->findClass(Cimv2, GetParam());
+    const Host::ClassDeclaration& declared =
+        *repository_->findClass(GetParam().nameSpace, GetParam().name);
     Host::Request request(manager_.broker());
     const auto answer = manager_.enumerateInstances(
-        request.context(), request.makePath(Cimv2, GetParam()), nullptr);
+        request.context(), request.makePath(GetParam().nameSpace, GetParam().name), nullptr);
     ASSERT_FALSE(answer.instances().empty());
     for (const Host::Instance* const instance : answer.instances()) {
         ASSERT_NE(instance->properties().size(), 0U);
@@ -55,19 +67,23 @@ TEST_P(ProvidedPropertiesTest, AreDeclaredWithTheTypeTheyHave)
 TEST_P(ProvidedPropertiesTest, KeysOfPathsAreThoseOfTheClass)
 {
     Host::Request request(manager_.broker());
-    const auto answer =
-        manager_.enumerateInstanceNames(request.context(), request.makePath(Cimv2, GetParam()));
+    const auto answer = manager_.enumerateInstanceNames(
+        request.context(), request.makePath(GetParam().nameSpace, GetParam().name));
     ASSERT_FALSE(answer.paths().empty());
     for (const Host::ObjectPath* const path : answer.paths()) {
         std::vector<std::string> keys;
         for (const Host::NamedValue& key : path->keys())
             keys.emplace_back(*key.name->text());
-        EXPECT_THAT(keys, UnorderedElementsAreArray(*repository_->keysOf(Cimv2, GetParam())));
+        EXPECT_THAT(keys,
+            UnorderedElementsAreArray(*repository_->keysOf(GetParam().nameSpace, GetParam().name)));
     }
 }
 
 INSTANTIATE_TEST_SUITE_P(Classes, ProvidedPropertiesTest,
-    ::testing::Values("ZUMLO_NumericSensor", "ZUMLO_SensorEnabledLogicalElementCapabilities",
-        "ZUMLO_SensorElementCapabilities", "ZUMLO_SensorSystemDevice", "ZUMLO_ComputerSystem"));
+    ::testing::Values(ProvidedClass{"ZUMLO_NumericSensor"},
+        ProvidedClass{"ZUMLO_SensorEnabledLogicalElementCapabilities"},
+        ProvidedClass{"ZUMLO_SensorElementCapabilities"}, ProvidedClass{"ZUMLO_SensorSystemDevice"},
+        ProvidedClass{"ZUMLO_ComputerSystem"},
+        ProvidedClass{"ZUMLO_SensorRegisteredProfile", "root/interop"}));
 
 } // namespace ProvidedPropertiesTests

@@ -105,10 +105,21 @@ TEST_F(ShippedSchemaTest, InteropDescribesTheObjectManager)
             "ObjectManagerName", "CreationClassName", "Name"));
     EXPECT_THAT(keys("CIM_ObjectManager", Interop),
         ElementsAre("SystemCreationClassName", "SystemName", "CreationClassName", "Name"));
-    EXPECT_THAT(keys("CIM_RegisteredProfile", Interop), ElementsAre("InstanceID"));
     EXPECT_THAT(ancestors("CIM_ObjectManager", Interop),
         ElementsAre("CIM_WBEMService", "CIM_Service", "CIM_EnabledLogicalElement",
             "CIM_LogicalElement", "CIM_ManagedSystemElement", "CIM_ManagedElement"));
+}
+
+TEST_F(ShippedSchemaTest, TheProfilesAssociationIsInBothNamespacesAndItsRegistrationInOne)
+{
+    EXPECT_THAT(keys("ZUMLO_SensorRegisteredProfile", Interop), ElementsAre("InstanceID"));
+    EXPECT_EQ(repository_->findClass(Cimv2, "ZUMLO_SensorRegisteredProfile"), nullptr);
+    for (const char* const nameSpace : {Cimv2, Interop})
+        EXPECT_THAT(keys("ZUMLO_SensorElementConformsToProfile", nameSpace),
+            ElementsAre("ConformantStandard", "ManagedElement"));
+    EXPECT_THAT(references("ZUMLO_SensorElementConformsToProfile"),
+        ElementsAre(
+            "ConformantStandard -> CIM_RegisteredProfile", "ManagedElement -> CIM_ManagedElement"));
 }
 
 // Other object managers compile one file after the other on top of the classes that they have.
@@ -119,6 +130,7 @@ TEST_F(ShippedSchemaTest, TheFilesCompileOneByOneToo)
     compiler.compileFile(Folder / "cim-ancestors.mof", Cimv2);
     compiler.compileFile(Folder / "sensor-profile-computer-system.mof", Cimv2);
     compiler.compileFile(Folder / "sensor-profile.mof", Cimv2);
+    compiler.compileFile(Folder / "sensor-profile-conformance.mof", Cimv2);
     const auto repository = std::move(compiler).finish();
     EXPECT_NE(repository->findClass(Cimv2, "ZUMLO_SensorSystemDevice"), nullptr);
 }
@@ -136,6 +148,7 @@ TEST_F(ShippedSchemaTest, TheAncestorsCompileAsOneFile)
     compiler.compileFile(files.write("10-cim.mof", all), Cimv2);
     compiler.compileFile(Folder / "sensor-profile-computer-system.mof", Cimv2);
     compiler.compileFile(Folder / "sensor-profile.mof", Cimv2);
+    compiler.compileFile(Folder / "sensor-profile-conformance.mof", Cimv2);
     const auto repository = std::move(compiler).finish();
     EXPECT_NE(repository->findClass(Cimv2, "ZUMLO_SensorSystemDevice"), nullptr);
 }

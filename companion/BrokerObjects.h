@@ -1,0 +1,45 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// Objects made through the broker, which owns them, and read from it. Any call of the broker may
+// return an unusable object: each is tested before each use.
+
+#pragma once
+
+#include <cmpidt.h>
+#include <cmpift.h>
+
+#include <cstdint>
+#include <string>
+
+namespace Vorn::Companion {
+
+// Returns whether the object is neither null nor without a handle.
+template <typename Object>
+bool isUsable(const Object* object)
+{
+    return object != nullptr && object->hdl != nullptr;
+}
+
+// Returns null when the path has none.
+const char* nameSpaceOf(const CMPIObjectPath* path);
+
+bool isOfClass(const CMPIObjectPath* path, const char* className);
+
+// Returns a path without keys; null without a namespace and when the broker fails.
+CMPIObjectPath* newPath(const CMPIBroker* broker, const char* nameSpace, const char* className,
+    const std::string& host);
+
+// Return whether the broker set the value.
+bool addKey(const CMPIObjectPath* path, const char* name, const char* text);
+bool addKey(const CMPIObjectPath* path, const char* name, const CMPIObjectPath* reference);
+bool setText(const CMPIInstance* instance, const char* name, const char* text);
+bool setReference(const CMPIInstance* instance, const char* name, const CMPIObjectPath* reference);
+
+// Leave the property out when the broker fails. The arrays have one element.
+void setCode(const CMPIInstance* instance, const char* name, std::uint16_t code);
+void setCodes(
+    const CMPIBroker* broker, const CMPIInstance* instance, const char* name, std::uint16_t code);
+void setTexts(
+    const CMPIBroker* broker, const CMPIInstance* instance, const char* name, const char* text);
+
+} // namespace Vorn::Companion

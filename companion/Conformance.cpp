@@ -1,0 +1,85 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "companion/Conformance.h"
+
+#include "companion/BrokerObjects.h"
+#include "companion/RegisteredProfile.h"
+#include "platform/utilities/KeyValue.h"
+#include "platform/utilities/ProviderUtilities.h"
+
+#include <cmpimacs.h>
+
+#include <algorithm>
+#include <array>
+#include <set>
+
+namespace Vorn::Companion {
+
+namespace {
+
+// Where object managers have the registrations of profiles, and CIM_Namespace.
+constexpr std::array interopNamespaces = {"root/interop", "root/PG_InterOp"};
+
+// Returns null where the object manager serves no registration.
+const CMPIObjectPath* registeredProfile(const Upcalls& upcalls)
+{
+    for (const char* const nameSpace : interopNamespaces)
+        if (const auto paths = upcalls.names(nameSpace, RegisteredProfileClass); !paths.empty())
+            return paths.front();
+    return nullptr;
+}
+
+std::set<std::string> nameSpacesBeside(const Upcalls& upcalls, const CMPIObjectPath* profile)
+{
+    std::set<std::string> names;
+    const char* const interop = nameSpaceOf(profile);
+    if (interop == nullptr)
+        return names;
+    for (const CMPIObjectPath* const path : upcalls.names(interop, "CIM_Namespace")) {
+        const KeyValue name = keyValue(CMGetKey(path, "Name", nullptr));
+        if (const auto* const text = std::get_if<std::string_view>(&name))
+            names.emplace(*text);
+    }
+    return names;
+}
+
+} // namespace
+
+Conformance wholeConformance(const Upcalls& upcalls)
+{
+    Conformance whole = {registeredProfile(upcalls), {}};
+    for (const std::string& nameSpace : nameSpacesBeside(upcalls, whole.profile))
+        for (CMPIObjectPath* const sensor : upcalls.names(nameSpace, SensorClass))
+            whole.sensors.push_back(sensor);
+    return whole;
+}
+
+Conformance conformanceOf(const Upcalls& upcalls, const CMPIObjectPath* object)
+{
+    if (isOfClass(object, RegisteredProfileClass)) {
+        Conformance whole = wholeConformance(upcalls);
+        return isObjPathsEqual(whole.profile, object, false) ? whole : Conformance();
+    }
+    const char* const nameSpace = nameSpaceOf(object);
+    if (!isOfClass(object, SensorClass) || nameSpace == nullptr)
+        return {};
+    Conformance one = {registeredProfile(upcalls), {}};
+    if (one.profile == nullptr)
+        return {};
+    one.sensors = upcalls.names(nameSpace, SensorClass);
+    std::erase_if(one.sensors,
+        [&](const CMPIObjectPath* sensor) { return !isObjPathsEqual(sensor, object, false); });
+    return one;
+}
+
+std::vector<CMPIInstance*> conformingSensors(
+    const Upcalls& upcalls, const CMPIObjectPath* profile, const char** properties)
+{
+    std::vector<CMPIInstance*> all;
+    for (const std::string& nameSpace : nameSpacesBeside(upcalls, profile))
+        for (CMPIInstance* const sensor : upcalls.instances(nameSpace, SensorClass, properties))
+            all.push_back(sensor);
+    return all;
+}
+
+} // namespace Vorn::Companion

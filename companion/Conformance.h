@@ -1,0 +1,33 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// Which sensors conform to the profile, and where they and its registration are. They are found by
+// up-calls: the sensors may be registered in any namespace, and object managers differ in the one
+// of the registration.
+
+#pragma once
+
+#include "companion/Upcalls.h"
+
+namespace Vorn::Companion {
+
+inline constexpr const char* SensorClass = "ZUMLO_NumericSensor";
+
+// A registration and sensors that conform to it: one association for each sensor.
+struct Conformance {
+    const CMPIObjectPath* profile = nullptr; // never null where there are sensors
+    std::vector<CMPIObjectPath*> sensors;
+};
+
+// Returns the registration with all sensors.
+Conformance wholeConformance(const Upcalls& upcalls);
+
+// Returns the registration with the sensors whose associations refer to the object: all for the
+// registration itself, the object alone for a sensor that exists, none for any other object.
+Conformance conformanceOf(const Upcalls& upcalls, const CMPIObjectPath* object);
+
+// Returns the instances of all sensors. The list of properties ends with a null and is null for all
+// properties.
+std::vector<CMPIInstance*> conformingSensors(
+    const Upcalls& upcalls, const CMPIObjectPath* profile, const char** properties);
+
+} // namespace Vorn::Companion

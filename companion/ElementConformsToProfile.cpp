@@ -1,0 +1,274 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// The provider of ZUMLO_SensorElementConformsToProfile, which associates the registration of the
+// profile with each sensor. This is DSP1033's methodology of central classes, which needs no
+// registration of the profile that sensors are scoped by. The ends are in different namespaces; as
+// DSP1033 requires, the association is in both.
+
+#include "companion/Answer.h"
+#include "companion/Conformance.h"
+#include "companion/RegisteredProfile.h"
+#include "platform/utilities/ProviderUtilities.h"
+
+#include <algorithm>
+#include <array>
+#include <atomic>
+#include <span>
+
+namespace Vorn::Companion {
+
+namespace {
+
+constexpr const char* ConformsClass = "ZUMLO_SensorElementConformsToProfile";
+
+// The names of the references.
+constexpr const char* standardRole = "ConformantStandard";
+constexpr const char* elementRole = "ManagedElement";
+
+// The names that a filter may give a class: its own and those of its superclasses.
+constexpr std::array<std::string_view, 2> associationClasses = {
+    ConformsClass, "CIM_ElementConformsToProfile"};
+constexpr std::array<std::string_view, 4> profileClasses = {RegisteredProfileClass,
+    "CIM_RegisteredProfile", "CIM_RegisteredSpecification", "CIM_ManagedElement"};
+constexpr std::array<std::string_view, 8> sensorClasses = {SensorClass, "CIM_NumericSensor",
+    "CIM_Sensor", "CIM_LogicalDevice", "CIM_EnabledLogicalElement", "CIM_LogicalElement",
+    "CIM_ManagedSystemElement", "CIM_ManagedElement"};
+
+// Some object managers call the factories again while requests run.
+std::atomic<const CMPIBroker*> theBroker = nullptr;
+
+enum class ResultKind { instances, paths };
+
+// The filters of an association operation (DSP0200, Associators); null or empty where the client
+// set none.
+struct Filters {
+    const char* associationClass = nullptr;
+    const char* resultClass = nullptr;
+    const char* role = nullptr;
+    const char* resultRole = nullptr;
+};
+
+bool admits(const char* filter, std::span<const std::string_view> names)
+{
+    return filter == nullptr || *filter == '\0' ||
+           std::any_of(names.begin(), names.end(),
+               [&](std::string_view name) { return isSameName(name, filter); });
+}
+
+bool admits(const char* filter, std::string_view name)
+{
+    return admits(filter, std::span(&name, 1));
+}
+
+// One request to the provider.
+class Request {
+public:
+    Request(const CMPIBroker* broker, const CMPIContext* context, const CMPIResult* result,
+        const CMPIObjectPath* target, ResultKind kind, const char** properties)
+        : broker_(broker), target_(target), kind_(kind), properties_(properties),
+          upcalls_(broker, context), answer_(broker, result)
+    {
+    }
+
+    CMPIStatus enumerate()
+    {
+        addAssociations(wholeConformance(upcalls_));
+        return answer_.finish();
+    }
+
+    CMPIStatus get()
+    {
+        Conformance found = wholeConformance(upcalls_);
+        std::erase_if(found.sensors, [&](const CMPIObjectPath* sensor) {
+            return !isObjPathsEqual(associationPath(found.profile, sensor), target_, true);
+        });
+        if (found.sensors.empty())
+            return failure(broker_, CMPI_RC_ERR_NOT_FOUND, "no such conformance");
+        addAssociations(found);
+        return answer_.finish();
+    }
+
+    CMPIStatus references(const Filters& filters)
+    {
+        if (admits(filters.associationClass, associationClasses) &&
+            admits(filters.role, isFromProfile_ ? standardRole : elementRole))
+            addAssociations(conformanceOf(upcalls_, target_));
+        return answer_.finish();
+    }
+
+    CMPIStatus associators(const Filters& filters)
+    {
+        using Classes = std::span<const std::string_view>;
+        if (admits(filters.associationClass, associationClasses) &&
+            admits(filters.resultClass,
+                isFromProfile_ ? Classes(sensorClasses) : Classes(profileClasses)) &&
+            admits(filters.role, isFromProfile_ ? standardRole : elementRole) &&
+            admits(filters.resultRole, isFromProfile_ ? elementRole : standardRole))
+            addFarEnds(conformanceOf(upcalls_, target_));
+        return answer_.finish();
+    }
+
+private:
+    const CMPIObjectPath* associationPath(
+        const CMPIObjectPath* profile, const CMPIObjectPath* sensor) const
+    {
+        const CMPIObjectPath* const path =
+            newPath(broker_, nameSpaceOf(target_), ConformsClass, getSystemName());
+        const bool isWhole =
+            addKey(path, standardRole, profile) && addKey(path, elementRole, sensor);
+        return isWhole ? path : nullptr;
+    }
+
+    const CMPIInstance* association(
+        const CMPIObjectPath* profile, const CMPIObjectPath* sensor) const
+    {
+        const CMPIObjectPath* const path =
+            newPath(broker_, nameSpaceOf(target_), ConformsClass, getSystemName());
+        const CMPIInstance* const instance =
+            path == nullptr ? nullptr : CMNewInstance(broker_, path, nullptr);
+        if (!isUsable(instance))
+            return nullptr;
+        std::array<const char*, 3> keys = {standardRole, elementRole, nullptr};
+        CMSetPropertyFilter(instance, properties_, keys.data());
+        const bool isWhole = setReference(instance, standardRole, profile) &&
+                             setReference(instance, elementRole, sensor);
+        return isWhole ? instance : nullptr;
+    }
+
+    void addAssociations(const Conformance& found)
+    {
+        for (const CMPIObjectPath* const sensor : found.sensors)
+            if (kind_ == ResultKind::paths)
+                answer_.add(associationPath(found.profile, sensor));
+            else
+                answer_.add(association(found.profile, sensor));
+    }
+
+    void addFarEnds(const Conformance& found)
+    {
+        if (found.sensors.empty())
+            return;
+        if (!isFromProfile_ && kind_ == ResultKind::paths)
+            answer_.add(found.profile);
+        else if (!isFromProfile_)
+            answer_.add(makeProfileInstance(broker_, found.profile, properties_));
+        else if (kind_ == ResultKind::paths)
+            for (const CMPIObjectPath* const sensor : found.sensors)
+                answer_.add(sensor);
+        else
+            for (const CMPIInstance* const sensor :
+                conformingSensors(upcalls_, found.profile, properties_))
+                answer_.add(sensor);
+    }
+
+    const CMPIBroker* broker_;
+    const CMPIObjectPath* target_;
+    ResultKind kind_;
+    const char** properties_;
+    const bool isFromProfile_ = isOfClass(target_, RegisteredProfileClass);
+    Upcalls upcalls_;
+    Answer answer_;
+};
+
+// Calls `work` with a request.
+template <typename Work>
+CMPIStatus serve(const CMPIContext* context, const CMPIResult* result, const CMPIObjectPath* target,
+    ResultKind kind, const char** properties, const Work& work)
+{
+    const CMPIBroker* const broker = theBroker;
+    return guarded(broker, [&] {
+        Request request(broker, context, result, target, kind, properties);
+        return work(request);
+    });
+}
+
+CMPIStatus enumerateNames(CMPIInstanceMI*, const CMPIContext* context, const CMPIResult* result,
+    const CMPIObjectPath* target)
+{
+    return serve(context, result, target, ResultKind::paths, nullptr,
+        [](Request& request) { return request.enumerate(); });
+}
+
+CMPIStatus enumerate(CMPIInstanceMI*, const CMPIContext* context, const CMPIResult* result,
+    const CMPIObjectPath* target, const char** properties)
+{
+    return serve(context, result, target, ResultKind::instances, properties,
+        [](Request& request) { return request.enumerate(); });
+}
+
+CMPIStatus get(CMPIInstanceMI*, const CMPIContext* context, const CMPIResult* result,
+    const CMPIObjectPath* target, const char** properties)
+{
+    return serve(context, result, target, ResultKind::instances, properties,
+        [](Request& request) { return request.get(); });
+}
+
+CMPIStatus associators(CMPIAssociationMI*, const CMPIContext* context, const CMPIResult* result,
+    const CMPIObjectPath* target, const char* associationClass, const char* resultClass,
+    const char* role, const char* resultRole, const char** properties)
+{
+    return serve(context, result, target, ResultKind::instances, properties, [&](Request& request) {
+        return request.associators({associationClass, resultClass, role, resultRole});
+    });
+}
+
+CMPIStatus associatorNames(CMPIAssociationMI*, const CMPIContext* context, const CMPIResult* result,
+    const CMPIObjectPath* target, const char* associationClass, const char* resultClass,
+    const char* role, const char* resultRole)
+{
+    return serve(context, result, target, ResultKind::paths, nullptr, [&](Request& request) {
+        return request.associators({associationClass, resultClass, role, resultRole});
+    });
+}
+
+CMPIStatus references(CMPIAssociationMI*, const CMPIContext* context, const CMPIResult* result,
+    const CMPIObjectPath* target, const char* associationClass, const char* role,
+    const char** properties)
+{
+    return serve(context, result, target, ResultKind::instances, properties, [&](Request& request) {
+        return request.references({.associationClass = associationClass, .role = role});
+    });
+}
+
+CMPIStatus referenceNames(CMPIAssociationMI*, const CMPIContext* context, const CMPIResult* result,
+    const CMPIObjectPath* target, const char* associationClass, const char* role)
+{
+    return serve(context, result, target, ResultKind::paths, nullptr, [&](Request& request) {
+        return request.references({.associationClass = associationClass, .role = role});
+    });
+}
+
+constexpr CMPIInstanceMIFT instanceHandlers = instanceTable(
+    "instanceSensorElementConformsToProfileProvider", {enumerateNames, enumerate, get});
+
+constexpr CMPIAssociationMIFT associationHandlers = {
+    .ftVersion = 200,
+    .miVersion = 200,
+    .miName = "associationSensorElementConformsToProfileProvider",
+    .cleanup = [](auto...) { return okStatus; },
+    .associators = associators,
+    .associatorNames = associatorNames,
+    .references = references,
+    .referenceNames = referenceNames,
+};
+
+CMPIInstanceMI instanceMI = {nullptr, &instanceHandlers};
+CMPIAssociationMI associationMI = {nullptr, &associationHandlers};
+
+} // namespace
+
+extern "C" [[gnu::visibility("default")]] CMPIInstanceMI*
+SensorElementConformsToProfileProvider_Create_InstanceMI(
+    const CMPIBroker* broker, const CMPIContext*, CMPIStatus* status)
+{
+    return createdWith(broker, status, theBroker, instanceMI);
+}
+
+extern "C" [[gnu::visibility("default")]] CMPIAssociationMI*
+SensorElementConformsToProfileProvider_Create_AssociationMI(
+    const CMPIBroker* broker, const CMPIContext*, CMPIStatus* status)
+{
+    return createdWith(broker, status, theBroker, associationMI);
+}
+
+} // namespace Vorn::Companion

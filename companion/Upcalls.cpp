@@ -1,0 +1,83 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "companion/Upcalls.h"
+
+#include "companion/BrokerObjects.h"
+#include "platform/utilities/ProviderUtilities.h"
+
+#include <cmpimacs.h>
+
+#include <stdexcept>
+
+namespace Vorn::Companion {
+
+namespace {
+
+// Returns whether the object manager says that it has no such class there, or no provider of it.
+bool saysThatNobodyServesIt(const CMPIStatus& status)
+{
+    return status.rc == CMPI_RC_ERR_INVALID_NAMESPACE || status.rc == CMPI_RC_ERR_INVALID_CLASS ||
+           status.rc == CMPI_RC_ERR_NOT_FOUND || status.rc == CMPI_RC_ERR_NOT_SUPPORTED;
+}
+
+// Object managers differ in whether a path that is returned to a provider has its namespace.
+CMPIObjectPath* inNameSpace(CMPIObjectPath* path, const std::string& nameSpace)
+{
+    const char* const actual = nameSpaceOf(path);
+    if (actual == nullptr || !isSameName(actual, nameSpace))
+        CMSetNameSpace(path, nameSpace.c_str());
+    return path;
+}
+
+} // namespace
+
+template <typename Enumerate>
+std::vector<CMPIValue> Upcalls::elements(const std::string& nameSpace, const char* className,
+    CMPIType type, const Enumerate& enumerate) const
+{
+    std::vector<CMPIValue> found;
+    CMPIStatus status = {CMPI_RC_OK, nullptr};
+    const CMPIObjectPath* const path =
+        newPath(broker_, nameSpace.c_str(), className, getSystemName());
+    const CMPIEnumeration* const all = path == nullptr ? nullptr : enumerate(path, &status);
+    while (status.rc == CMPI_RC_OK && isUsable(all) && CMHasNext(all, &status)) {
+        // The state of an element is ignored, since object managers differ in it.
+        const CMPIData element = CMGetNext(all, &status);
+        if (status.rc == CMPI_RC_OK && element.type == type)
+            found.push_back(element.value);
+    }
+    if (saysThatNobodyServesIt(status))
+        return {};
+    if (path == nullptr || status.rc != CMPI_RC_OK)
+        throw std::runtime_error(
+            "the instances of " + std::string(className) + " cannot be enumerated");
+    return found;
+}
+
+std::vector<CMPIObjectPath*> Upcalls::names(
+    const std::string& nameSpace, const char* className) const
+{
+    std::vector<CMPIObjectPath*> paths;
+    for (const CMPIValue& element :
+        elements(nameSpace, className, CMPI_ref, [&](const CMPIObjectPath*path, CMPIStatus*status) {
+            return CBEnumInstanceNames(broker_, context_, path, status);
+        }))
+        if (isUsable(element.ref))
+            paths.push_back(inNameSpace(element.ref, nameSpace));
+    return paths;
+}
+
+std::vector<CMPIInstance*> Upcalls::instances(
+    const std::string& nameSpace, const char* className, const char** properties) const
+{
+    std::vector<CMPIInstance*> all;
+    for (const CMPIValue& element : elements(nameSpace, className, CMPI_instance,
+             [&](const CMPIObjectPath*path, CMPIStatus*status) {
+                 return CBEnumInstances(broker_, context_, path, properties, status);
+             }))
+        if (isUsable(element.inst))
+            all.push_back(element.inst);
+    return all;
+}
+
+} // namespace Vorn::Companion

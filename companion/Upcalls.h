@@ -1,0 +1,40 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// What a request learns of other providers, through the object manager.
+
+#pragma once
+
+#include <cmpidt.h>
+
+#include <string>
+#include <vector>
+
+namespace Vorn::Companion {
+
+// The functions return objects of the broker. Where nobody serves the class in the namespace, there
+// are none. They throw std::runtime_error when the object manager fails in another way.
+class Upcalls {
+public:
+    Upcalls(const CMPIBroker* broker, const CMPIContext* context)
+        : broker_(broker), context_(context)
+    {
+    }
+
+    // Returns the paths of the class's instances. Each has its namespace.
+    std::vector<CMPIObjectPath*> names(const std::string& nameSpace, const char* className) const;
+
+    // The list of properties ends with a null and is null for all properties.
+    std::vector<CMPIInstance*> instances(
+        const std::string& nameSpace, const char* className, const char** properties) const;
+
+private:
+    // Calls `enumerate(path, status)` with the path of the class. Returns the elements of the type.
+    template <typename Enumerate>
+    std::vector<CMPIValue> elements(const std::string& nameSpace, const char* className,
+        CMPIType type, const Enumerate& enumerate) const;
+
+    const CMPIBroker* broker_;
+    const CMPIContext* context_;
+};
+
+} // namespace Vorn::Companion
