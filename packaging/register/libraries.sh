@@ -18,8 +18,6 @@ choose_provider_folder() {
   is_folder_known=false
 }
 
-wants_library() { "$with_computer_system" || [ "$1" != "${libraries[1]}" ]; }
-
 is_same_folder() { [ "$(readlink -f "$1")" = "$(readlink -f "$2")" ]; }
 
 is_our_link() { [ -L "$1" ] && [ "$(readlink "$1")" = "$library_folder/${1##*/}" ]; }
@@ -44,16 +42,12 @@ link_libraries() {
   local each
   is_same_folder "$used_folder" "$library_folder" && return
   for each in "${libraries[@]}"; do
-    if wants_library "$each" && is_foreign "$used_folder/$each"; then
+    if is_foreign "$used_folder/$each"; then
       refuse "$used_folder/$each is somebody else's; it must be put out of the way first"
     fi
   done
   for each in "${libraries[@]}"; do
-    if ! is_our_link "$used_folder/$each"; then
-      if wants_library "$each"; then step ln -s "$library_folder/$each" "$used_folder/$each"; fi
-    elif ! wants_library "$each"; then
-      step rm "$used_folder/$each"
-    fi
+    is_our_link "$used_folder/$each" || step ln -s "$library_folder/$each" "$used_folder/$each"
   done
 }
 

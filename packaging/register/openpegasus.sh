@@ -6,7 +6,8 @@
 # Prints the provider folders of its packages.
 provider_folders() { printf '%s\n' /usr/lib64/Pegasus/providers /usr/lib/Pegasus/providers; }
 
-modules=(SensorProfileModule SensorProfileComputerSystemModule)
+interop_namespace=root/PG_InterOp
+modules=(SensorProfileModule SensorProfileRegistrationModule SensorProfileComputerSystemModule)
 
 # Sets `registered` to those of our modules that OpenPegasus lists.
 find_registered_modules() {
@@ -20,7 +21,7 @@ find_registered_modules() {
     fi
   done
   [ ${#registered[@]} -gt 0 ] || return 0
-  [[ " ${registered[*]} " == *" ${modules[1]} "* ]] || options+=(--without-computer-system)
+  [[ " ${registered[*]} " == *" ${modules[-1]} "* ]] || options+=(--without-computer-system)
   earlier_command="$(command_to register "${options[@]}") (NAMESPACE being the one it was in)"
 }
 
@@ -35,7 +36,7 @@ remove_modules() {
 
 openpegasus_register() {
   # -uc alone replaces a class of the same major version only.
-  local sensors=(-uc -aV) system=(-uc -aV)
+  local each sensors=(-uc -aV) system=(-uc -aV)
   # An association refers to ZUMLO_ComputerSystem. Without -uc the class is added where it is missing
   # and left as it is where somebody else defined it; -w suppresses the warning that it is there.
   "$with_computer_system" || system=(-w)
@@ -43,9 +44,15 @@ openpegasus_register() {
   document sensor-profile-registration.mof '/^\/\/ The computer system,/,$'
   link_libraries
   step cimmof "${system[@]}" -n "$namespace" "$share/sensor-profile-computer-system.mof"
-  step cimmof "${sensors[@]}" -n "$namespace" "$share/sensor-profile.mof"
+  # One file at a time: of several, cimmof reports only whether the last one compiled.
+  for each in sensor-profile.mof sensor-profile-conformance.mof; do
+    step cimmof "${sensors[@]}" -n "$namespace" "$share/$each"
+  done
+  for each in sensor-profile-conformance.mof sensor-profile-registered-profile.mof; do
+    step cimmof "${sensors[@]}" -n $interop_namespace "$share/$each"
+  done
   remove_modules
-  step cimmof -n root/PG_InterOp "$registration"
+  step cimmof -n $interop_namespace "$registration"
   unlink_former_library
 }
 

@@ -7,7 +7,11 @@
 # sensor-profile-register.
 
 registration_name=sensor-profile.reg
-class_names=(sensor-profile-computer-system.mof sensor-profile.mof)
+interop_namespace=root/interop
+# The files with classes: of the sensors' namespace, of that of registered profiles, and all.
+sensor_files=(sensor-profile.mof sensor-profile-conformance.mof)
+interop_files=(sensor-profile-conformance.mof sensor-profile-registered-profile.mof)
+class_names=(sensor-profile-computer-system.mof sensor-profile.mof "${interop_files[@]}")
 # Whether a removal found anything.
 was_registered=false
 
@@ -84,8 +88,10 @@ find_registration() {
 # Prints the namespaces in which our classes are staged.
 staged_namespaces() {
   [ -d "$stage/mofs" ] || return 0
-  find "$stage/mofs" \( -name "${class_names[0]}" -o -name "${class_names[1]}" \) \
-    -printf '%P\n' | sed 's|/[^/]*$||' | sort --unique
+  local names
+  printf -v names '|%s' "${class_names[@]}"
+  find "$stage/mofs" -regextype egrep -regex ".*/(${names:1})" -printf '%P\n' |
+    sed 's|/[^/]*$||' | sort --unique
 }
 
 # Prints the files of our classes that are staged in the given namespace, or in all.
@@ -103,17 +109,17 @@ staged_classes() {
 # Prints the staged files that the new registration does not have: those of other namespaces, and the
 # class of a computer system that is not registered.
 outdated_classes() {
-  local each
-  for each in $(staged_namespaces); do
-    [ "$each" = "$namespace" ] || staged_classes "$each"
-  done
-  "$with_computer_system" || existing "$stage/mofs/$namespace/${class_names[0]}"
+  comm -23 <(staged_classes | sort) \
+    <(printf '%s\n' "${sensor_files[@]/#/$stage/mofs/$namespace/}" \
+      "${interop_files[@]/#/$stage/mofs/$interop_namespace/}" | sort)
 }
 
 # Prints the staged files that a removal deletes.
 staged_files() {
   staged_classes ${namespace:+"$namespace"}
-  "$keeps_registration" || existing "$stage/regs/$registration_name"
+  "$keeps_registration" && return
+  [ -z "$namespace" ] || staged_classes $interop_namespace
+  existing "$stage/regs/$registration_name"
 }
 
 # ---- Changes
@@ -124,11 +130,10 @@ staged_files() {
 build_repository() { "$1" sfcbrepos -s "$stage" "${repository_options[@]}" -f; }
 
 stage_providers() {
-  local each outdated classes=("${class_names[@]}")
-  "$with_computer_system" || classes=("${class_names[1]}")
-  for each in "${classes[@]}"; do
-    "$1" sfcbstage -s "$stage" -n "$namespace" -r "$registration" "$share/$each"
-  done
+  local outdated
+  "$1" sfcbstage -s "$stage" -n "$namespace" -r "$registration" "${sensor_files[@]/#/$share/}"
+  "$1" sfcbstage -s "$stage" -n $interop_namespace -r "$registration" \
+    "${interop_files[@]/#/$share/}"
   mapfile -t outdated < <(outdated_classes)
   [ ${#outdated[@]} -eq 0 ] || "$1" rm "${outdated[@]}"
   build_repository "$1"
@@ -162,6 +167,7 @@ try_in_copy() {
 }
 
 sfcb_register() {
+  ! "$with_computer_system" || sensor_files=("${class_names[0]}" "${sensor_files[@]}")
   find_stage
   find_registration
   document $registration_name '/^\[ZUMLO_ComputerSystem\]$/,/^#$/'

@@ -87,7 +87,10 @@ TEST(InstalledLibraryTest, ExportsItsFactoriesAndNothingElse)
             "SensorSystemDeviceProvider_Create_InstanceMI",
             "SensorSystemDeviceProvider_Create_AssociationMI"));
     EXPECT_THAT(exportedNames(installedFile(systemLibrary)),
-        UnorderedElementsAre("ComputerSystemProvider_Create_InstanceMI"));
+        UnorderedElementsAre("ComputerSystemProvider_Create_InstanceMI",
+            "SensorElementConformsToProfileProvider_Create_AssociationMI",
+            "SensorElementConformsToProfileProvider_Create_InstanceMI",
+            "SensorRegisteredProfileProvider_Create_InstanceMI"));
 }
 
 // An object manager loads every library that a provider depends on.

@@ -36,7 +36,9 @@ const std::vector<std::string> providerFiles = {"lib/cmpi/libSensorProfileComput
     "share/sensor-profile/registration/sensor-profile-registration.mof",
     "share/sensor-profile/registration/sensor-profile.reg",
     "share/sensor-profile/sensor-profile-computer-system.mof",
+    "share/sensor-profile/sensor-profile-conformance.mof",
     "share/sensor-profile/sensor-profile-model.schema.json",
+    "share/sensor-profile/sensor-profile-registered-profile.mof",
     "share/sensor-profile/sensor-profile.mof"};
 
 const std::vector<std::string> toolFiles = {"bin/sensorctl", "etc/sensor-profile/serve.conf",

@@ -3,6 +3,8 @@
 // Compares the registration documents with the table of the embedded object manager.
 
 #include "host/manager/SensorProfile.h"
+#include "host/repository/Repository.h"
+#include "tests/support/ShippedClasses.h"
 #include "tests/tools/ToolTest.h"
 
 #include <gmock/gmock.h>
@@ -16,14 +18,13 @@ namespace RegistrationTests {
 using testing::UnorderedElementsAreArray;
 
 const std::string folder = SENSOR_PROFILE_SOURCE_DIR "/schema/registration/";
-constexpr const char* nameSpace = "root/cimv2";
 
 struct Registration {
     std::string className;
     std::string provider;
     std::string location; // the library without lib and .so
     std::string kinds;
-    std::string nameSpace;
+    std::string nameSpaces; // with blanks between them
 
     auto operator<=>(const Registration&) const = default;
 };
@@ -31,16 +32,28 @@ struct Registration {
 void PrintTo(const Registration& each, std::ostream* out)
 {
     *out << each.className << " by " << each.provider << " in " << each.location << " ("
-         << each.kinds << ", " << each.nameSpace << ")";
+         << each.kinds << ", " << each.nameSpaces << ")";
+}
+
+// Returns the namespaces that have the class.
+std::string nameSpacesOf(const Host::Repository& classes, const std::string& className)
+{
+    std::string found;
+    for (const auto& nameSpace : classes.namespaces())
+        if (nameSpace->findClass(className) != nullptr)
+            found += (found.empty() ? "" : " ") + nameSpace->name();
+    return found;
 }
 
 std::vector<Registration> embeddedTable()
 {
+    const auto classes = Testing::shippedClasses();
     std::vector<Registration> table;
     for (const Host::ProviderRegistration& each :
-        Host::sensorProfileProviders("SensorProfileProvider", "SensorProfileComputerSystem")) {
+        Host::registeredProfileProviders("SensorProfileProvider", "SensorProfileComputerSystem")) {
         const std::string kinds = each.servesAssociations ? "instance association" : "instance";
-        table.push_back({each.className, each.providerName, each.libraryFile, kinds, nameSpace});
+        table.push_back({each.className, each.providerName, each.libraryFile, kinds,
+            nameSpacesOf(*classes, each.className)});
     }
     return table;
 }
@@ -85,7 +98,7 @@ std::vector<Registration> readBlocks(const std::string& text)
         }
         const std::map<std::string, std::string*> members = {{"provider", &blocks.back().provider},
             {"location", &blocks.back().location}, {"type", &blocks.back().kinds},
-            {"namespace", &blocks.back().nameSpace}};
+            {"namespace", &blocks.back().nameSpaces}};
         *members.at(match[1]) = match[2];
     }
     return blocks;
@@ -103,6 +116,10 @@ TEST(RegistrationMofTest, SaysWhatTheEmbeddedManagerKnows)
         readInstances(Testing::contentOf(folder + "sensor-profile-registration.mof"));
     const std::map<std::string, std::string> kinds = {
         {"{2}", "instance"}, {"{2, 3}", "instance association"}};
+    // OpenPegasus has another name for root/interop.
+    const std::map<std::string, std::string> nameSpaces = {{"{\"root/cimv2\"}", "root/cimv2"},
+        {"{\"root/PG_InterOp\"}", "root/interop"},
+        {"{\"root/cimv2\", \"root/PG_InterOp\"}", "root/cimv2 root/interop"}};
 
     std::map<std::string, std::string> locations; // by module
     auto [module, lastModule] = instances.equal_range("PG_ProviderModule");
@@ -113,7 +130,7 @@ TEST(RegistrationMofTest, SaysWhatTheEmbeddedManagerKnows)
         EXPECT_EQ(properties.at("InterfaceVersion"), "2.0.0");
         EXPECT_EQ(properties.at("Version"), SENSOR_PROFILE_VERSION);
     }
-    EXPECT_EQ(locations.size(), 2U);
+    EXPECT_EQ(locations.size(), 3U);
 
     std::set<std::pair<std::string, std::string>> providers; // with their modules
     auto [provider, lastProvider] = instances.equal_range("PG_Provider");
@@ -131,9 +148,8 @@ TEST(RegistrationMofTest, SaysWhatTheEmbeddedManagerKnows)
         const std::string name = properties.at("ProviderName");
         const std::string moduleName = properties.at("ProviderModuleName");
         EXPECT_TRUE(providers.contains({moduleName, name})) << name;
-        EXPECT_EQ(properties.at("Namespaces"), "{\"root/cimv2\"}");
         registrations.push_back({properties.at("ClassName"), name, locations.at(moduleName),
-            kinds.at(properties.at("ProviderType")), nameSpace});
+            kinds.at(properties.at("ProviderType")), nameSpaces.at(properties.at("Namespaces"))});
     }
     EXPECT_THAT(registrations, UnorderedElementsAreArray(embeddedTable()));
 }
@@ -147,7 +163,8 @@ std::vector<std::string> matches(const std::string& text, const char* pattern)
 // OpenPegasus replaces a class only by one of another version.
 TEST(RegisteredClassesTest, HaveTheVersionOfTheProduct)
 {
-    for (const std::string name : {"sensor-profile.mof", "sensor-profile-computer-system.mof"}) {
+    for (const std::string name : {"sensor-profile.mof", "sensor-profile-computer-system.mof",
+             "sensor-profile-conformance.mof", "sensor-profile-registered-profile.mof"}) {
         const std::string text = Testing::contentOf(SENSOR_PROFILE_SOURCE_DIR "/schema/" + name);
         const auto versions = matches(text, R"re(\bVersion\("([^"]*)"\))re");
         EXPECT_THAT(versions, testing::Each(SENSOR_PROFILE_VERSION)) << name;
