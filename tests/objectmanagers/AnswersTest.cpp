@@ -36,8 +36,11 @@ Declarations declarationsIn(const ObjectManager& manager)
     Declarations declarations;
     for (const std::string name : {"ZUMLO_NumericSensor", "ZUMLO_ComputerSystem",
              "ZUMLO_SensorEnabledLogicalElementCapabilities", "ZUMLO_SensorSystemDevice",
-             "ZUMLO_SensorElementCapabilities"})
+             "ZUMLO_SensorElementCapabilities", "ZUMLO_SensorElementConformsToProfile"})
         declarations[name] = ask({"gc", manager.url(name)}).objects.begin()->second;
+    const std::string profile = "ZUMLO_SensorRegisteredProfile";
+    declarations[profile] =
+        ask({"gc", manager.url(profile, manager.interop())}).objects.begin()->second;
     return declarations;
 }
 

@@ -18,6 +18,7 @@ using Result = std::optional<Equivalent>;
 
 constexpr const char* systemDevice = "ZUMLO_SensorSystemDevice";
 constexpr const char* elementCapabilities = "ZUMLO_SensorElementCapabilities";
+constexpr const char* conformance = "ZUMLO_SensorElementConformsToProfile";
 
 bool isSame(const std::string& one, const std::string& other)
 {
@@ -69,13 +70,26 @@ bool isOnAssociations(const Request& request)
 
 // ---- Both
 
+// Returns a request for each association of a sensor: the first one for those of the sensors'
+// provider.
+Equivalent byEachAssociation(Request ours, Request conforming)
+{
+    Request one = ours;
+    one.association = systemDevice;
+    ours.association = elementCapabilities;
+    conforming.association = conformance;
+    return {.requests = {one, ours, conforming}};
+}
+
 Result withoutRoles(const Request& request)
 {
-    if (request.role.empty() && request.resultRole.empty())
+    if ((request.role.empty() && request.resultRole.empty()) || request.association == conformance)
         return std::nullopt;
     Request other = request;
     other.role = other.resultRole = "";
-    return Equivalent{.requests = {other}};
+    if (!request.association.empty() || !isFromSensor(request))
+        return Equivalent{.requests = {other}};
+    return byEachAssociation(other, request);
 }
 
 bool hasKnownResultClass(const Request& request)
@@ -87,11 +101,7 @@ Result askingEach(const Request& request)
 {
     if (!request.isAssociators() || !request.association.empty() || !hasKnownResultClass(request))
         return std::nullopt;
-    Request one = request;
-    Request other = request;
-    one.association = systemDevice;
-    other.association = elementCapabilities;
-    return Equivalent{.requests = {one, other}};
+    return byEachAssociation(request, request);
 }
 
 Result withoutResultClass(const Request& request)
@@ -113,8 +123,8 @@ Result withExactResultClass(const Request& request)
 
 std::string classOf(const std::string& path)
 {
-    const std::string local = path.substr(path.starts_with("root/cimv2:") ? 11 : 0);
-    return local.substr(0, local.find('.'));
+    const std::string whole = path.substr(0, path.find('.'));
+    return whole.substr(whole.rfind(':') + 1);
 }
 
 std::vector<std::string> namesIn(const std::string& list)
@@ -164,6 +174,21 @@ Result refusingUnknownClasses(const Request& request)
     return std::nullopt;
 }
 
+void renameInterop(const Request&, const Declarations&, Answer& answer)
+{
+    const auto renamed = [](const std::string& text) {
+        return replaced(text, "root/interop:", "root/PG_InterOp:");
+    };
+    Answer changed;
+    for (auto& [path, properties] : answer.objects) {
+        for (auto& [name, value] : properties)
+            if (value)
+                value = renamed(*value);
+        changed.objects.emplace(renamed(path), properties);
+    }
+    answer.objects = changed.objects;
+}
+
 // ---- sfcb
 
 Result notFindingAssociations(const Request& request)
@@ -191,11 +216,13 @@ Result withAnyResultClass(const Request& request)
 
 Result withoutPropertyList(const Request& request)
 {
-    if (!request.isReferences() || request.properties.empty())
+    if (!request.isReferences() || request.properties.empty() || request.association == conformance)
         return std::nullopt;
     Request other = request;
     other.properties = "";
-    return Equivalent{.requests = {other}};
+    if (!request.association.empty() || !isFromSensor(request))
+        return Equivalent{.requests = {other}};
+    return byEachAssociation(other, request);
 }
 
 Result withWholeSystems(const Request& request)
@@ -208,7 +235,9 @@ Result withWholeSystems(const Request& request)
     one.association = systemDevice;
     one.properties = "";
     other.association = elementCapabilities;
-    return Equivalent{.requests = {one, other}};
+    Request conforming = request;
+    conforming.association = conformance;
+    return Equivalent{.requests = {one, other, conforming}};
 }
 
 Result needingTheAssociation(const Request& request)
@@ -223,7 +252,8 @@ Result needingTheAssociation(const Request& request)
 Result needingTheExactAssociation(const Request& request)
 {
     if (!request.isAssociators() || request.association.empty() ||
-        request.association == systemDevice || request.association == elementCapabilities)
+        request.association == systemDevice || request.association == elementCapabilities ||
+        request.association == conformance)
         return std::nullopt;
     return Equivalent{.error = isSystemDevice(request) ? 0 : 1};
 }
@@ -251,6 +281,10 @@ void spellAsTheClient(const Request& request, const Declarations&, Answer& answe
         return;
     Answer changed;
     for (const auto& [path, properties] : answer.objects) {
+        if (classOf(path) == conformance) {
+            changed.objects.emplace(path, properties);
+            continue;
+        }
         Properties ends = properties;
         for (auto& [name, end] : ends)
             if (end)
@@ -281,7 +315,8 @@ void dropUnwantedKeys(const Request& request, const Declarations&, Answer& answe
 constexpr std::array ofOpenPegasus = {
     Difference{"code 4 for an unknown class of the association or of the source",
         refusingUnknownClasses, nullptr},
-    Difference{"roles are not applied", withoutRoles, nullptr},
+    Difference{"registered profiles are in root/PG_InterOp", nullptr, renameInterop},
+    Difference{"sensors' associations do not apply roles", withoutRoles, nullptr},
     Difference{"without association class, each association is asked", askingEach, nullptr},
     Difference{"ZUMLO_SensorElementCapabilities does not apply a result class", withoutResultClass,
         nullptr},
@@ -293,11 +328,12 @@ constexpr std::array ofOpenPegasus = {
 
 constexpr std::array ofSfcb = {
     Difference{"code 6 for an unknown class of the association", notFindingAssociations, nullptr},
-    Difference{"roles are not applied", withoutRoles, nullptr},
+    Difference{"sensors' associations do not apply roles", withoutRoles, nullptr},
     Difference{"code 1 for methods", withoutMethods, nullptr},
     Difference{
         "an unknown result class is as good as one of other objects", withAnyResultClass, nullptr},
-    Difference{"references do not apply a property list", withoutPropertyList, nullptr},
+    Difference{"references by sensors' associations do not apply a property list",
+        withoutPropertyList, nullptr},
     Difference{
         "systems that associators lead to do not apply a property list", withWholeSystems, nullptr},
     Difference{"without association class, code 1 from systems and capabilities",

@@ -23,6 +23,11 @@ public:
     const std::string& name() const { return name_; }
     const std::string& folder() const { return folder_; }
     unsigned port() const { return port_; }
+    // Returns the namespace of registered profiles.
+    std::string interop() const
+    {
+        return this == &openPegasus() ? "root/PG_InterOp" : "root/interop";
+    }
     std::string url(const std::string& object, const std::string& space = "root/cimv2") const;
 
     // Starts it; its providers inherit the variables. Returns when it answers.

@@ -101,6 +101,27 @@ protected:
         return ask({"ein", manager_.url(className, space)});
     }
 
+    // Returns the paths of the sensors that conform to the registered profile.
+    std::set<std::string> conformingSensors() const
+    {
+        const Answer answer = ask({"ain", "-ac", "ZUMLO_SensorElementConformsToProfile",
+            manager_.url(
+                "ZUMLO_SensorRegisteredProfile.InstanceID=\"ZUMLO:DSP1009\"", manager_.interop())});
+        std::set<std::string> paths;
+        for (const auto& [path, properties] : answer.objects)
+            paths.insert(path);
+        return paths;
+    }
+
+    // Returns the paths of the sensors in the namespace.
+    std::set<std::string> sensorsIn(const std::string& space) const
+    {
+        std::set<std::string> paths;
+        for (const auto& [path, properties] : names("ZUMLO_NumericSensor", space).objects)
+            paths.insert(space + ':' + path);
+        return paths;
+    }
+
     // In OpenPegasus a namespace must have the classes above ours.
     void compileAncestors(const std::string& space) const
     {
@@ -140,10 +161,13 @@ TEST_P(RegistrationTest, MovesToAnotherNamespace)
 {
     runRegister({"register"});
     EXPECT_EQ(count("ZUMLO_SensorSystemDevice"), 40U);
+    EXPECT_EQ(conformingSensors(), sensorsIn("root/cimv2"));
     if (!isSfcb())
         compileAncestors("root/sensors");
     runRegister({"register", "--namespace", "root/sensors"});
     EXPECT_EQ(count("ZUMLO_SensorSystemDevice", "root/sensors"), 40U);
+    EXPECT_EQ(conformingSensors(), sensorsIn("root/sensors"));
+    EXPECT_EQ(conformingSensors().size(), 40U);
     // OpenPegasus keeps the classes, which nobody serves.
     EXPECT_EQ(count("ZUMLO_NumericSensor"), 0U);
     EXPECT_EQ(names("ZUMLO_NumericSensor").error, isSfcb() ? 5 : 0);
@@ -187,6 +211,7 @@ TEST_P(RegistrationTest, WorksWithoutComputerSystem)
     EXPECT_EQ(count("ZUMLO_NumericSensor"), 40U);
     EXPECT_EQ(count("ZUMLO_SensorElementCapabilities"), 40U);
     EXPECT_EQ(count("ZUMLO_SensorSystemDevice"), 0U);
+    EXPECT_EQ(conformingSensors().size(), 40U);
 }
 
 TEST_P(RegistrationTest, StaysAsItWasWhenClassesDoNotCompile)

@@ -16,7 +16,8 @@ const Texts instanceClasses = {
 const Texts associationClasses = {"ZUMLO_SensorSystemDevice", "ZUMLO_SensorElementCapabilities"};
 const Texts enumeratedClasses = {"CIM_NumericSensor", "CIM_Sensor",
     "CIM_EnabledLogicalElementCapabilities", "CIM_SystemDevice", "CIM_ElementCapabilities",
-    "zumlo_numericsensor", "zumlo_SENSORsystemdevice", "No_Class"};
+    "zumlo_numericsensor", "zumlo_SENSORsystemdevice", "ZUMLO_SensorElementConformsToProfile",
+    "No_Class"};
 
 // Each is asked for alone or with others, in its own spelling or another one.
 const Texts propertyLists = {"Caption", "caption", "Status", "HealthState,Status",
@@ -27,8 +28,8 @@ const Texts endLists = {"GroupComponent", "groupcomponent", "GroupComponent,Part
     "No_Property"};
 
 const Texts associations = {"", "ZUMLO_SensorSystemDevice", "ZUMLO_SensorElementCapabilities",
-    "CIM_SystemDevice", "CIM_ElementCapabilities", "CIM_Component", "zumlo_sensorsystemdevice",
-    "No_Class"};
+    "ZUMLO_SensorElementConformsToProfile", "CIM_SystemDevice", "CIM_ElementCapabilities",
+    "CIM_Component", "zumlo_sensorsystemdevice", "No_Class"};
 const Texts resultClasses = {"", "ZUMLO_NumericSensor", "ZUMLO_ComputerSystem",
     "ZUMLO_SensorEnabledLogicalElementCapabilities", "CIM_System", "CIM_Sensor",
     "CIM_ManagedElement", "zumlo_computersystem", "No_Class"};
