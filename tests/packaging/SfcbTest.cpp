@@ -2,109 +2,19 @@
 
 // Tests of registering in sfcb.
 
-#include "tests/packaging/RegisterTest.h"
+#include "tests/packaging/SfcbTest.h"
 #include "tests/support/Requirement.h"
 
 #include <unistd.h>
 
-#include <tuple>
-
 namespace SfcbTests {
 
 using testing::AllOf;
-using testing::AnyOf;
 using testing::ElementsAre;
 using testing::HasSubstr;
 using testing::IsEmpty;
 using testing::Not;
-using namespace Testing;
 namespace fs = std::filesystem;
-
-class SfcbTest : public RegisterTest {
-protected:
-    SfcbTest() : RegisterTest({"sfcbstage", "sfcbrepos"}) {}
-
-    // Returns the staged files except sfcb's own.
-    Lines stage() const
-    {
-        Lines files = filesBelow(path("stage"));
-        std::erase(files, "default.reg");
-        return files;
-    }
-
-    // Returns the calls that change the staging folder; others work on a copy of it.
-    Lines steps() const
-    {
-        Lines all = calls();
-        std::erase_if(all, [this](const std::string& call) {
-            return call.find(" -s " + path("stage") + " ") == call.npos;
-        });
-        return all;
-    }
-
-    std::string repository() const
-    {
-        return contentOf(path("registration/repository/root/cimv2/classes"));
-    }
-
-    void expectRefusalWithoutChange(const std::string& action, const std::string& reason) const
-    {
-        const auto before = std::tuple(filesBelow(path("stage")), links(), repository());
-        const Ended ended = runRegister({action});
-        EXPECT_EQ(ended.code, 1);
-        EXPECT_THAT(
-            ended.err, AllOf(HasSubstr(reason), testing::EndsWith("Nothing was changed.\n")));
-        EXPECT_EQ(std::tuple(filesBelow(path("stage")), links(), repository()), before);
-    }
-
-    std::string stagedRegistration() const
-    {
-        return contentOf(path("stage/regs/sensor-profile.reg"));
-    }
-
-    static std::string stepOf(const std::string& stage, const std::string& nameSpace,
-        const std::string& registration, const Lines& files)
-    {
-        std::string step = "sfcbstage -s " + stage + " -n " + nameSpace + " -r " + registration;
-        for (const std::string& file : files)
-            step += " " + shared(file);
-        return step;
-    }
-
-    // Returns the step that stages the classes of the sensors' namespace.
-    std::string stageStep(const std::string& nameSpace = "root/cimv2",
-        const std::string& registration = shared("registration/sensor-profile.reg")) const
-    {
-        return stepOf(
-            path("stage"), nameSpace, registration, {computerSystem_, sensors_, conformance_});
-    }
-
-    // Returns the step that stages those of the profile's registration.
-    std::string profileStep(
-        const std::string& registration = shared("registration/sensor-profile.reg")) const
-    {
-        return stepOf(path("stage"), "root/interop", registration, {conformance_, profile_});
-    }
-
-    // Returns the files that a registration in the namespace stages.
-    static Lines staged(const std::string& nameSpace)
-    {
-        Lines files = {"mofs/" + nameSpace + "/" + computerSystem_,
-            "mofs/" + nameSpace + "/" + conformance_, "mofs/" + nameSpace + "/" + sensors_,
-            std::string("mofs/root/interop/") + conformance_,
-            std::string("mofs/root/interop/") + profile_, "regs/sensor-profile.reg"};
-        std::sort(files.begin(), files.end());
-        return files;
-    }
-
-    std::string stagedMof(const std::string& name) const { return path("stage/mofs/" + name); }
-
-    static constexpr const char* computerSystem_ = "sensor-profile-computer-system.mof";
-    static constexpr const char* sensors_ = "sensor-profile.mof";
-    static constexpr const char* conformance_ = "sensor-profile-conformance.mof";
-    static constexpr const char* profile_ = "sensor-profile-registered-profile.mof";
-    const std::string buildStep_ = "sfcbrepos -s " + path("stage") + " -f";
-};
 
 TEST_F(SfcbTest, StagesTheFilesAndBuildsTheRepository)
 {
@@ -114,87 +24,6 @@ TEST_F(SfcbTest, StagesTheFilesAndBuildsTheRepository)
     EXPECT_EQ(stagedRegistration(), contentOf(shared("registration/sensor-profile.reg")));
     EXPECT_THAT(
         links(), ElementsAre("libSensorProfileComputerSystem.so", "libSensorProfileProvider.so"));
-}
-
-class ConfiguredSfcbTest : public SfcbTest {
-protected:
-    ConfiguredSfcbTest()
-    {
-        for (const char* const name : {"own/stage", "own/lib", "own/lib/cmpi", "etc/sfcb"})
-            fs::create_directories(path(name));
-        folder_.write("own/stage/default.reg", "");
-    }
-
-    // Writes a configuration with a comment, blanks and a provider folder that does not exist.
-    void configure(const std::string& file, const std::string& registration) const
-    {
-        folder_.write(file, "##  Locations\n#registrationDir: /none\nregistrationDir: " +
-                                registration + " \n  providerDirs:\t" + path("own/lib") + " " +
-                                path("own/lib/cmpi") + " /no/such\nhttpPort: 5988\n");
-    }
-
-    const std::string build_ =
-        "sfcbrepos -s " + path("own/stage") + " -r " + path("own/registration") + " -f";
-};
-
-TEST_F(ConfiguredSfcbTest, HasTheFoldersOfTheConfigurationBesideItsProgram)
-{
-    configure("etc/sfcb/sfcb.cfg", path("own/registration"));
-    for (int time = 0; time < 2; ++time) {
-        EXPECT_EQ(runAsTyped({"register"}).code, 0);
-        EXPECT_THAT(calls(), AllOf(testing::SizeIs(6), testing::Contains(build_)));
-        EXPECT_THAT(
-            filesBelow(path("own/lib")), ElementsAre("cmpi/libSensorProfileComputerSystem.so",
-                                             "cmpi/libSensorProfileProvider.so"));
-        EXPECT_THAT(filesBelow(path("own/registration")),
-            ElementsAre("providerRegister", "repository/root/cimv2/classes",
-                "repository/root/interop/classes"));
-    }
-    EXPECT_EQ(runAsTyped({"remove"}).code, 0);
-    EXPECT_THAT(filesBelow(path("own/lib")), IsEmpty());
-    EXPECT_THAT(filesBelow(path("own/stage")), ElementsAre("default.reg"));
-}
-
-TEST_F(ConfiguredSfcbTest, TakesTheConfigurationThatIsNamed)
-{
-    configure("etc/sfcb/sfcb.cfg", "/no/such");
-    configure("other.cfg", path("own/registration"));
-    EXPECT_THAT(plan({"register", "--configuration", path("other.cfg")}), HasSubstr(build_ + "\n"));
-    failAt(4);
-    const Ended ended = runAsTyped({"register", "--configuration=" + path("other.cfg")});
-    failNoMore();
-    EXPECT_THAT(ended.err, HasSubstr("To undo it: " + program_ +
-                                     " remove --object-manager sfcb "
-                                     "--namespace root/cimv2 --configuration " +
-                                     path("other.cfg") + "\n"));
-}
-
-TEST_F(ConfiguredSfcbTest, TakesTheFoldersThatAreNamed)
-{
-    configure("etc/sfcb/sfcb.cfg", path("own/registration"));
-    const std::string planned = plan(
-        {"register", "--provider-folder", path("providers"), "--staging-folder", path("stage")});
-    EXPECT_THAT(planned, AllOf(HasSubstr(linkStep(sensorLibrary_)),
-                             HasSubstr("sfcbrepos -s " + path("stage") + " -r " +
-                                       path("own/registration") + " -f\n")));
-}
-
-TEST_F(ConfiguredSfcbTest, ChangesNothingInAStagingFolderThatIsALink)
-{
-    configure("etc/sfcb/sfcb.cfg", path("own/registration"));
-    fs::remove_all(path("own/stage"));
-    fs::create_directory_symlink(path("stage"), path("own/stage"));
-    folder_.write("stage/other.mof", "");
-    fs::remove(path("CIM/CIM_Schema.mof"));
-    EXPECT_EQ(runAsTyped({"register"}).code, 1);
-    EXPECT_THAT(stage(), ElementsAre("other.mof"));
-}
-
-TEST_F(ConfiguredSfcbTest, LinksNothingWhereItLooksInTheFolderOfTheLibraries)
-{
-    folder_.write("etc/sfcb/sfcb.cfg", "providerDirs: " + library() + " " + path("own/lib") + "\n");
-    EXPECT_THAT(plan({"register", "--staging-folder", path("stage")}),
-        Not(AnyOf(HasSubstr("ln -s"), HasSubstr("must look"))));
 }
 
 // Somebody staged classes that the CIM schema has, too.
@@ -405,78 +234,5 @@ TEST_F(SfcbTest, DryRunCanBeFollowed)
     EXPECT_EQ(stagedRegistration(), registration);
     EXPECT_EQ(links(), linked);
 }
-
-class EveryFirstStepOfSfcbTest : public EveryStepOf<SfcbTest> {};
-
-TEST_P(EveryFirstStepOfSfcbTest, CanFailAndBeUndone)
-{
-    const std::string message = failing(3, {"register"},
-        {linkStep(sensorLibrary_), linkStep(systemLibrary_), stageStep(), profileStep(),
-            buildStep_});
-    mustRunAdvice(message, "To undo it: ", "\n");
-    EXPECT_THAT(links(), IsEmpty());
-    EXPECT_THAT(stage(), IsEmpty());
-    mustRun({"register"});
-    EXPECT_EQ(stage(), staged("root/cimv2"));
-}
-
-INSTANTIATE_TEST_SUITE_P(Steps, EveryFirstStepOfSfcbTest, testing::Range<std::size_t>(0, 5));
-
-class EveryMovingStepOfSfcbTest : public EveryStepOf<SfcbTest> {};
-
-TEST_P(EveryMovingStepOfSfcbTest, CanFailAndLeadBack)
-{
-    mustRun({"register", "--without-computer-system"});
-    const Lines files = stage();
-    const std::string registration = stagedRegistration();
-    const std::string message = failing(4, {"register", "--namespace", "root/new"},
-        {stageStep("root/new", "sensor-profile.reg"), profileStep("sensor-profile.reg"),
-            "rm " + stagedMof("root/cimv2/") + conformance_ + " " + stagedMof("root/cimv2/") +
-                sensors_,
-            buildStep_});
-    EXPECT_THAT(message, Not(HasSubstr(" remove ")));
-    mustRunAdvice(message, "To undo it: ", "\n");
-    EXPECT_EQ(stage(), files);
-    EXPECT_EQ(stagedRegistration(), registration);
-    EXPECT_EQ(links().size(), 2U);
-}
-
-INSTANTIATE_TEST_SUITE_P(Steps, EveryMovingStepOfSfcbTest, testing::Range<std::size_t>(0, 4));
-
-class EveryRemovalStepOfSfcbTest : public EveryStepOf<SfcbTest> {
-protected:
-    EveryRemovalStepOfSfcbTest() { mustRun({"register", "--namespace", "root/s"}); }
-
-    std::string failingRemoval()
-    {
-        return failing(2, {"remove"},
-            {"rm " + stagedMof("root/interop/") + conformance_ + " " + stagedMof("root/interop/") +
-                    profile_ + " " + stagedMof("root/s/") + computerSystem_ + " " +
-                    stagedMof("root/s/") + sensors_ + " " + stagedMof("root/s/") + conformance_ +
-                    " " + path("stage/regs/sensor-profile.reg"),
-                buildStep_, unlinkStep(sensorLibrary_), unlinkStep(systemLibrary_)});
-    }
-};
-
-TEST_P(EveryRemovalStepOfSfcbTest, CanFailAndBeUndone)
-{
-    const Lines files = stage();
-    const std::string registration = stagedRegistration();
-    mustRunAdvice(failingRemoval(), "To undo it: ", "\n");
-    EXPECT_EQ(stage(), files);
-    EXPECT_EQ(stagedRegistration(), registration);
-    EXPECT_EQ(links().size(), 2U);
-}
-
-TEST_P(EveryRemovalStepOfSfcbTest, CanFailAndBeRepeated)
-{
-    failingRemoval();
-    mustRun({"remove"});
-    EXPECT_THAT(calls(), testing::Contains(buildStep_));
-    EXPECT_THAT(stage(), IsEmpty());
-    EXPECT_THAT(links(), IsEmpty());
-}
-
-INSTANTIATE_TEST_SUITE_P(Steps, EveryRemovalStepOfSfcbTest, testing::Range<std::size_t>(0, 4));
 
 } // namespace SfcbTests
