@@ -6,6 +6,8 @@ set(CPACK_DEBIAN_PACKAGE_RELEASE 1)
 set(CPACK_DEBIAN_PACKAGE_SHLIBDEPS ON)
 set(CPACK_DEBIAN_PACKAGE_CONTROL_STRICT_PERMISSION ON)
 
+# The default configuration of libsensors, of which the libraries contain a copy.
+set(CPACK_DEBIAN_PROVIDER_PACKAGE_DEPENDS libsensors-config)
 set(CPACK_DEBIAN_TOOL_PACKAGE_DEPENDS
   "sensor-profile-provider (= ${PROJECT_VERSION}-${CPACK_DEBIAN_PACKAGE_RELEASE}), adduser")
 set(CPACK_DEBIAN_TOOL_PACKAGE_SUGGESTS "lm-sensors, sblim-wbemcli")

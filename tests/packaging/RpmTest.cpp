@@ -248,7 +248,7 @@ TEST_F(RpmRootTest, NeedsTheLibrariesThatItLoads)
 {
     rpm("-e system");
     const std::string missing = tryRpm("-i " + packages().files()).err;
-    for (const std::string name : {"libsensors\\.so[^ ]*", "libsystemd\\.so[^ ]*", "/usr/bin/find"})
+    for (const std::string name : {"libfmt\\.so[^ ]*", "libsystemd\\.so[^ ]*", "/usr/bin/find"})
         EXPECT_THAT(missing, ContainsRegex("\t" + name + " is needed by sensor-profile-provider-"));
     for (const std::string name : {"libmicrohttpd\\.so[^ ]*", "systemd"})
         EXPECT_THAT(missing, ContainsRegex("\t" + name + " is needed by sensor-profile-[0-9]"));

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// libsensors' list of chips, shared by all sources of the process.
+// The list of chips of the private copy of libsensors.
 
 #pragma once
 
@@ -13,14 +13,13 @@
 
 namespace Vorn::Hwmon {
 
-// libsensors keeps one list for the whole process. Any number of threads may read it, but renewing
-// it excludes all others: a caller of libsensors holds a lock of this class for the duration of the
-// call, and no longer, so that a thread with two cursors cannot block itself.
+// libsensors keeps one list, which all sources of the process share. Any number of threads may read
+// it, but renewing it excludes all others: a caller of libsensors holds a lock of this class for
+// the duration of the call, and no longer, so that a thread with two cursors cannot block itself.
 //
 // While libsensors reads its configuration it sets the process's locale to "C" and back, which its
 // interface cannot prevent. This happens at the first request and when the machine or the
-// configuration has changed. Another user of libsensors in the same process shares the list and is
-// not excluded by the lock.
+// configuration has changed. Another user of libsensors in the process has a list of its own.
 class ChipList {
 public:
     using Lock = std::shared_lock<std::shared_mutex>;

@@ -5,7 +5,15 @@
 #include <sensors/error.h>
 
 #include <atomic>
+#include <cstdio>
 #include <new>
+
+// The private copy of libsensors has these names for the standard streams.
+extern "C" {
+FILE* sensorsStdin = stdin;
+FILE* sensorsStdout = stdout;
+FILE* sensorsStderr = stderr;
+}
 
 namespace Vorn::Hwmon {
 

@@ -7,9 +7,9 @@
 
 namespace Vorn::Hwmon {
 
-// Keeps libsensors from printing and from ending the process. It reports through function pointers
-// that are global to the process; by default they print to standard error, and the one for fatal
-// errors calls exit(). An object replaces them during its lifetime and then restores them.
+// Keeps libsensors from printing and from ending the process. It reports through global function
+// pointers; by default they print to standard error, and the one for fatal errors calls exit(). An
+// object replaces them during its lifetime and then restores them.
 //
 // The fatal error is a lack of memory. Its hook must not return, so it throws std::bad_alloc
 // through libsensors, which holds no locks and whose unwind tables let exceptions pass; what
