@@ -39,6 +39,7 @@ std::string readLine(int descriptor)
     if (::geteuid() == 0)
         words.emplace_back("--user=root"); // only root can read the machine's model
     std::vector<char*> arguments;
+    arguments.reserve(words.size() + 1);
     for (std::string& word : words)
         arguments.push_back(word.data());
     arguments.push_back(nullptr);

@@ -21,6 +21,7 @@ public:
     ServerProcess(const ServerProcess&) = delete;
     ServerProcess& operator=(const ServerProcess&) = delete;
 
+    ::pid_t id() const { return pid_; }
     std::uint16_t port() const { return port_; }
     // Returns the time from the start of the process until it accepts requests.
     std::chrono::nanoseconds startUp() const { return startUp_; }

@@ -1,0 +1,329 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// What requests cost on a machine with real chips, beside what the kernel, libsensors and the
+// program `sensors` take for the same attributes. Prints a table of medians for each machine.
+//
+//     bench_hwmon [rounds]
+
+#include "bench/HwmonTree.h"
+#include "bench/ServerProcess.h"
+#include "bench/Skim.h"
+#include "host/broker/Broker.h"
+#include "host/broker/CollectedResult.h"
+#include "host/broker/ObjectPath.h"
+#include "host/broker/Request.h"
+#include "host/broker/Result.h"
+#include "model/SensorHarvest.h"
+#include "platform/logging/LogSettings.h"
+#include "tests/providers/Factories.h"
+#include "tests/support/CimCall.h"
+#include "tests/support/Environment.h"
+#include "tests/support/HttpClient.h"
+
+#include <fcntl.h>
+#include <sensors/sensors.h>
+#include <spawn.h>
+#include <sys/resource.h>
+#include <sys/wait.h>
+#include <unistd.h>
+
+#include <algorithm>
+#include <array>
+#include <chrono>
+#include <cstddef>
+#include <cstdio>
+#include <cstdlib>
+#include <ctime>
+#include <exception>
+#include <functional>
+#include <memory>
+#include <stdexcept>
+#include <string>
+#include <vector>
+
+namespace {
+
+using Bench::HwmonTree;
+using Clock = std::chrono::steady_clock;
+
+constexpr const char* className = "ZUMLO_NumericSensor";
+
+struct Cost {
+    double cpu; // milliseconds
+    double wall;
+};
+
+double milliseconds(Clock::duration duration)
+{
+    return std::chrono::duration<double, std::milli>(duration).count();
+}
+
+double cpuTime(::clockid_t clock)
+{
+    ::timespec time{};
+    ::clock_gettime(clock, &time);
+    return static_cast<double>(time.tv_sec) * 1e3 + static_cast<double>(time.tv_nsec) / 1e6;
+}
+
+// Returns what the work costs the process that the clock belongs to.
+Cost costOf(const std::function<void()>& work, ::clockid_t clock = CLOCK_PROCESS_CPUTIME_ID)
+{
+    const double cpu = cpuTime(clock);
+    const auto wall = Clock::now();
+    work();
+    return {cpuTime(clock) - cpu, milliseconds(Clock::now() - wall)};
+}
+
+void expect(bool holds, const char* what)
+{
+    if (!holds)
+        throw std::runtime_error(std::string("unexpected: ") + what);
+}
+
+// ---- In this process ----
+
+class Descriptor {
+public:
+    explicit Descriptor(const std::string& path) : number_(::open(path.c_str(), O_RDONLY)) {}
+    ~Descriptor() { ::close(number_); }
+    Descriptor(const Descriptor&) = delete;
+    Descriptor& operator=(const Descriptor&) = delete;
+
+    int number() const { return number_; }
+
+private:
+    int number_;
+};
+
+// Reads each attribute from the descriptor of its chip's folder.
+class RawReads {
+public:
+    explicit RawReads(const HwmonTree& tree) : tree_(&tree)
+    {
+        for (const HwmonTree::Chip& chip : tree.chips())
+            folders_.push_back(std::make_unique<Descriptor>(chip.folder));
+    }
+
+    void operator()() const
+    {
+        std::array<char, 64> text{};
+        for (std::size_t i = 0; i < folders_.size(); ++i)
+            for (const std::string& attribute : tree_->chips()[i].attributes) {
+                const int file = ::openat(folders_[i]->number(), attribute.c_str(), O_RDONLY);
+                expect(::read(file, text.data(), text.size()) > 0, "an unreadable attribute");
+                ::close(file);
+            }
+    }
+
+private:
+    const HwmonTree* tree_;
+    std::vector<std::unique_ptr<Descriptor>> folders_;
+};
+
+// Reads each attribute through libsensors, whose list of chips the requests have initialised.
+void readBySubfeatures(std::size_t attributes)
+{
+    std::size_t read = 0;
+    int chipNumber = 0;
+    while (const auto* const chip = sensors_get_detected_chips(nullptr, &chipNumber)) {
+        int featureNumber = 0;
+        while (const auto* const feature = sensors_get_features(chip, &featureNumber)) {
+            int number = 0;
+            while (const auto* const each = sensors_get_all_subfeatures(chip, feature, &number)) {
+                double value = 0.0;
+                expect(sensors_get_value(chip, each->number, &value) == 0, "an unreadable value");
+                ++read;
+            }
+        }
+    }
+    expect(read == attributes, "another number of subfeatures");
+}
+
+void harvest(std::size_t sensors)
+{
+    std::vector<Vorn::SensorProfileProvider::Sensor> records;
+    Vorn::SensorProfileProvider::getSensorInstances(records);
+    expect(records.size() == sensors, "another number of records");
+}
+
+class Provider {
+public:
+    template <typename Handler>
+    void request(std::size_t objects, const Handler& handler) const
+    {
+        Host::Request request(broker_);
+        Host::CollectedResult answer;
+        Host::Result result(answer);
+        auto& path = request.makePath("root/cimv2", className);
+        const CMPIStatus status = handler(mi_, request, result.handle(), path);
+        expect(status.rc == CMPI_RC_OK, "a failed request");
+        expect(answer.instances().size() + answer.paths().size() == objects,
+            "another number of objects");
+    }
+
+private:
+    Host::Broker broker_;
+    CMPIInstanceMI* mi_ =
+        SensorProfileProvider_Create_InstanceMI(broker_.handle(), nullptr, nullptr);
+};
+
+// ---- Other processes ----
+
+Cost program(std::vector<std::string> words)
+{
+    std::vector<char*> arguments(words.size() + 1, nullptr);
+    std::transform(words.begin(), words.end(), arguments.begin(),
+        [](std::string& word) { return word.data(); });
+    ::posix_spawn_file_actions_t actions;
+    ::posix_spawn_file_actions_init(&actions);
+    ::posix_spawn_file_actions_addopen(&actions, STDOUT_FILENO, "/dev/null", O_WRONLY, 0);
+    ::pid_t child = -1;
+    const auto begin = Clock::now();
+    const int error =
+        ::posix_spawnp(&child, arguments.front(), &actions, nullptr, arguments.data(), environ);
+    ::posix_spawn_file_actions_destroy(&actions);
+    expect(error == 0, "a program that does not start");
+    ::rusage usage{};
+    int status = 0;
+    expect(::wait4(child, &status, 0, &usage) == child && status == 0, "a program that fails");
+    const auto of = [](const ::timeval& time) {
+        return static_cast<double>(time.tv_sec) * 1e3 + static_cast<double>(time.tv_usec) / 1e3;
+    };
+    return {of(usage.ru_utime) + of(usage.ru_stime), milliseconds(Clock::now() - begin)};
+}
+
+::clockid_t clockOf(::pid_t process)
+{
+    ::clockid_t clock{};
+    expect(::clock_getcpuclockid(process, &clock) == 0, "a server that has ended");
+    return clock;
+}
+
+// ---- The table ----
+
+struct Row {
+    const char* name;
+    const char* peer; // an earlier row
+    std::function<Cost()> measure;
+    Cost median = {};
+};
+
+double medianOf(std::vector<double>& values)
+{
+    std::nth_element(values.begin(),
+        values.begin() + static_cast<std::ptrdiff_t>(values.size() / 2), values.end());
+    return values[values.size() / 2];
+}
+
+// Measures the rows in turn, so that what disturbs the machine meets all of them.
+void measure(std::vector<Row>& rows, std::size_t rounds)
+{
+    std::vector<std::vector<double>> cpu(rows.size());
+    std::vector<std::vector<double>> wall(rows.size());
+    for (std::size_t round = 0; round <= rounds; ++round)
+        for (std::size_t i = 0; i < rows.size(); ++i) {
+            const Cost cost = rows[i].measure();
+            if (round == 0) // fills caches
+                continue;
+            cpu[i].push_back(cost.cpu);
+            wall[i].push_back(cost.wall);
+        }
+    for (std::size_t i = 0; i < rows.size(); ++i)
+        rows[i].median = {medianOf(cpu[i]), medianOf(wall[i])};
+}
+
+void print(const std::vector<Row>& rows, std::size_t sensors)
+{
+    for (const Row& row : rows) {
+        const auto peer = std::find_if(rows.begin(), rows.end(),
+            [&](const Row& other) { return std::string(other.name) == row.peer; });
+        std::printf("| %zu | %s | %.2f | %.2f | %.2f | %.2f | %.2f of %s |\n", sensors, row.name,
+            row.median.cpu, row.median.wall, row.median.cpu * 1e3 / static_cast<double>(sensors),
+            row.median.cpu / rows.front().median.cpu, row.median.cpu / peer->median.cpu,
+            peer->name);
+    }
+}
+
+void compare(int wanted, std::size_t rounds)
+{
+    const HwmonTree tree(wanted);
+    const auto sensors = tree.chips().size() * HwmonTree::sensorsOfChip;
+    std::size_t attributes = 0;
+    for (const HwmonTree::Chip& chip : tree.chips())
+        attributes += chip.attributes.size();
+    const RawReads raw(tree);
+    const Provider provider;
+    harvest(sensors); // initialises libsensors
+    const Bench::ServerProcess server;
+    Testing::HttpClient client(server.port());
+    const std::string request =
+        Testing::cimRequest("EnumerateInstances", Testing::cimClassParameter(className));
+    const std::string sensorctl = SENSOR_PROFILE_BINARY_DIR "/bin/sensorctl";
+
+    const auto enumInstanceNames = [&] {
+        provider.request(sensors, [](auto* mi, auto& handling, auto* result, auto& path) {
+            return mi->ft->enumerateInstanceNames(
+                mi, handling.context().handle(), result, path.handle());
+        });
+    };
+    const auto enumInstances = [&] {
+        provider.request(sensors, [](auto* mi, auto& handling, auto* result, auto& path) {
+            return mi->ft->enumerateInstances(
+                mi, handling.context().handle(), result, path.handle(), nullptr);
+        });
+    };
+    const auto getInstance = [&] {
+        provider.request(1, [](auto* mi, auto& handling, auto* result, auto& path) {
+            path.addKey("DeviceID", Host::Value::text(handling.arena(), HwmonTree::someDeviceID()));
+            return mi->ft->getInstance(
+                mi, handling.context().handle(), result, path.handle(), nullptr);
+        });
+    };
+    const auto overHttp = [&] {
+        client.send(request);
+        expect(Bench::skim(client) > sensors, "a closed connection");
+    };
+
+    std::vector<Row> rows = {{"raw reads", "raw reads", [&] { return costOf(std::cref(raw)); }},
+        {"libsensors", "raw reads", [&] { return costOf([&] { readBySubfeatures(attributes); }); }},
+        {"harvest", "raw reads", [&] { return costOf([&] { harvest(sensors); }); }},
+        {"EnumInstanceNames", "harvest", [&] { return costOf(enumInstanceNames); }},
+        {"EnumInstances", "harvest", [&] { return costOf(enumInstances); }},
+        {"GetInstance", "harvest", [&] { return costOf(getInstance); }},
+        {"EnumerateInstances of the server", "EnumInstances",
+            [&] { return costOf(overHttp, clockOf(server.id())); }},
+        {"sensors -j", "sensors -j",
+            [] {
+                return program({"sensors", "-j"});
+            }},
+        {"sensorctl list", "sensors -j",
+            [&] {
+                return program({sensorctl, "list"});
+            }},
+        {"sensorctl list --json", "sensors -j", [&] {
+             return program({sensorctl, "list", "--json"});
+         }}};
+    measure(rows, rounds);
+    print(rows, sensors);
+}
+
+} // namespace
+
+int main(int argc, char** argv)
+{
+    try {
+        RynLog::configure({6000, "off", "off"});
+        const Testing::EnvironmentVariable hardware("VORN_INSTRUMENTATION", "hwmon");
+        const Testing::EnvironmentVariable log("RYNLOG_LOG", "off");
+        const int rounds = argc > 1 ? std::atoi(argv[1]) : 21;
+        expect(rounds > 0, "a number of rounds that is not positive");
+        std::puts("| sensors | what | CPU ms | wall ms | CPU us/sensor | times raw | times peer |\n"
+                  "|---|---|---|---|---|---|---|");
+        for (const int sensors : {100, 1000, 5000})
+            compare(sensors, static_cast<std::size_t>(rounds));
+        return 0;
+    } catch (const std::exception& error) {
+        std::fprintf(stderr, "bench_hwmon: %s\n", error.what());
+        return 1;
+    }
+}

@@ -1,0 +1,91 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// A machine with any number of sensors on chips, as a sysfs tree that is bound over /sys/class.
+// REQUIRES: the process is in a mount namespace of its own, with the right to mount.
+
+#pragma once
+
+#include "tests/support/TemporaryFolder.h"
+
+#include <cerrno>
+#include <filesystem>
+#include <string>
+#include <system_error>
+#include <vector>
+
+#include <sys/mount.h>
+
+namespace Bench {
+
+class HwmonTree {
+public:
+    static constexpr int sensorsOfChip = 20;
+
+    struct Chip {
+        std::string folder;
+        std::vector<std::string> attributes; // those with a number
+    };
+
+    // `sensors` is rounded down to whole chips.
+    explicit HwmonTree(int sensors)
+    {
+        std::filesystem::create_directories(folder_.path() / "hwmon");
+        for (int number = 1; number <= sensors / sensorsOfChip; ++number)
+            chips_.push_back(layOut(number));
+        if (::mount(folder_.path().c_str(), mountPoint, nullptr, MS_BIND, nullptr) != 0)
+            throw std::system_error(errno, std::generic_category(), "mount over /sys/class");
+    }
+    ~HwmonTree() { ::umount2(mountPoint, MNT_DETACH); }
+    HwmonTree(const HwmonTree&) = delete;
+    HwmonTree& operator=(const HwmonTree&) = delete;
+
+    const std::vector<Chip>& chips() const { return chips_; }
+
+    // Returns the device identifier of a sensor on the first chip.
+    static std::string someDeviceID() { return "Core 1:/hwmon/bench-isa-0001/temp1"; }
+
+private:
+    static constexpr const char* mountPoint = "/sys/class";
+
+    Chip layOut(int number) const
+    {
+        const std::string device = "devices/bench." + std::to_string(number);
+        std::filesystem::create_directories(folder_.path() / device);
+        std::filesystem::create_symlink(
+            "../../bus/platform", folder_.path() / device / "subsystem");
+        const std::string folder = "hwmon/hwmon" + std::to_string(number) + "/";
+        std::filesystem::create_directories(folder_.path() / folder);
+        std::filesystem::create_symlink("../../" + device, folder_.path() / (folder + "device"));
+        folder_.write(folder + "name", "bench\n");
+        Chip chip{"/sys/class/" + folder, {}};
+        const auto add = [&](const std::string& name, const char* value) {
+            folder_.write(folder + name, std::string(value) + "\n");
+            chip.attributes.push_back(name);
+        };
+        for (int index = 1; index <= 7; ++index) {
+            const std::string temperature = "temp" + std::to_string(index);
+            folder_.write(folder + temperature + "_label", "Core " + std::to_string(index) + "\n");
+            add(temperature + "_input", "41000");
+            add(temperature + "_max", "80000");
+            add(temperature + "_crit", "95000");
+            add(temperature + "_crit_alarm", "0");
+            const std::string voltage = "in" + std::to_string(index);
+            add(voltage + "_input", "1200");
+            add(voltage + "_min", "1100");
+            add(voltage + "_max", "1300");
+            add(voltage + "_alarm", "0");
+        }
+        for (int index = 1; index <= 6; ++index) {
+            const std::string fan = "fan" + std::to_string(index);
+            add(fan + "_input", "900");
+            add(fan + "_min", "300");
+            add(fan + "_alarm", "0");
+        }
+        return chip;
+    }
+
+    Testing::TemporaryFolder folder_;
+    std::vector<Chip> chips_;
+};
+
+} // namespace Bench
