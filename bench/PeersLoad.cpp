@@ -1,7 +1,7 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// What requests cost in sensorctl serve, OpenPegasus and sfcb: one client on a connection that
-// stays open, the same providers and the same model file, in turn. Prints a table.
+// Measures requests in sensorctl serve, OpenPegasus and sfcb, in turn: each has one client on a
+// connection that stays open, the same providers and the same model file. Prints a table.
 //
 //     bench_peers [rounds]
 
@@ -12,13 +12,13 @@
 #include "tests/objectmanagers/ObjectManager.h"
 #include "tests/support/CimCall.h"
 #include "tests/support/HttpClient.h"
+#include "tests/support/Texts.h"
 
 #include <algorithm>
 #include <chrono>
 #include <cstdio>
 #include <cstdlib>
 #include <exception>
-#include <functional>
 #include <stdexcept>
 #include <string>
 #include <vector>
@@ -41,7 +41,6 @@ public:
     }
 
     const std::string& name() const { return name_; }
-    std::size_t bytes() const { return bytes_; }
 
     std::string bodyOf(const std::string& request)
     {
@@ -50,18 +49,13 @@ public:
         return client_.receive().body;
     }
 
-    // sfcb closes a connection after 10 requests: the request is sent again on a new one then.
+    // sfcb closes a connection after 10 requests: the request is sent once more on a new one then.
     void measure(const std::string& request)
     {
-        bytes_ = 0;
-        while (bytes_ == 0) {
-            const auto begin = Clock::now();
-            if (client_.trySend(request))
-                bytes_ = Bench::skim(client_);
-            if (bytes_ == 0)
-                client_ = HttpClient(port_);
-            else
-                durations_.push_back(Milliseconds(Clock::now() - begin).count());
+        if (!trySend(request)) {
+            client_ = HttpClient(port_);
+            if (!trySend(request))
+                throw std::runtime_error(name_ + " closes each connection");
         }
     }
 
@@ -75,20 +69,21 @@ public:
     }
 
 private:
+    // Returns false where the server has closed the connection.
+    bool trySend(const std::string& request)
+    {
+        const auto begin = Clock::now();
+        if (!client_.trySend(request) || Bench::skim(client_) == 0)
+            return false;
+        durations_.push_back(Milliseconds(Clock::now() - begin).count());
+        return true;
+    }
+
     std::string name_;
     std::uint16_t port_;
     HttpClient client_;
     std::vector<double> durations_;
-    std::size_t bytes_ = 0;
 };
-
-std::size_t count(const std::string& text, const std::string& part)
-{
-    std::size_t found = 0;
-    for (auto at = text.find(part); at != std::string::npos; at = text.find(part, at + 1))
-        ++found;
-    return found;
-}
 
 std::string getInstance(const std::string& moreParameters = {})
 {
@@ -133,9 +128,9 @@ void print(const Row& row, std::vector<Peer>& peers, int rounds)
     std::vector<std::size_t> properties;
     for (Peer& peer : peers) {
         const std::string body = peer.bodyOf(row.request);
-        if (count(body, "<INSTANCE ") != row.instances)
+        if (Testing::countOf(body, "<INSTANCE ") != row.instances)
             throw std::runtime_error(peer.name() + " answers " + body.substr(0, 500));
-        properties.push_back(count(body, "<PROPERTY") / row.instances);
+        properties.push_back(Testing::countOf(body, "<PROPERTY") / row.instances);
     }
     for (int round = 0; round < rounds; ++round)
         for (Peer& peer : peers)

@@ -24,7 +24,7 @@ check_packages=(
 bench_packages=(
   "${build_packages[@]}"
   libbenchmark-dev
-  lm-sensors util-linux
+  iproute2 lm-sensors util-linux
 )
 
 # Prints the packages of the list that are not installed, one per line.
