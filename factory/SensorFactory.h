@@ -2,7 +2,7 @@
 
 #pragma once
 
-#include "factory/SensorTexts.h"
+#include "factory/RequestTexts.h"
 #include "model/Sensor.h"
 #include "model/SensorEnabledLogCap.h"
 
@@ -30,6 +30,9 @@ public:
     SensorFactory(bool isSen, bool isCap);
     SensorFactory(const SensorFactory&) = delete;
     SensorFactory& operator=(const SensorFactory&) = delete;
+
+    // Returns the name of the system, which is the host of the paths that the factory makes.
+    const std::string& systemName() const { return texts.systemName(); }
 
     // Returns the number of device identifiers, truncated to 16 bits.
     unsigned short getNumberOfInstances();
@@ -95,7 +98,7 @@ private:
     void _createSensorMap();
     void _createEnabledLogicalElementCapMap();
 
-    const SensorTexts texts;
+    const RequestTexts texts;
 
     // The records in the order of the harvest, with duplicates. The maps take over the content of
     // the records.

@@ -6,8 +6,8 @@
 #include "factory/ClassNames.h"
 #include "factory/InstanceWriter.h"
 #include "factory/PropertySelection.h"
+#include "factory/RequestTexts.h"
 #include "factory/SensorFactory.h"
-#include "factory/SensorTexts.h"
 #include "factory/TraceLines.h"
 
 #include <cmpimacs.h>
@@ -63,7 +63,7 @@ constexpr const char* operationalStatusFailedTrace =
 // Sets the selected properties of one instance in order.
 class SensorProperties {
 public:
-    SensorProperties(Sensor& sensor, const SensorTexts& texts, const PropertySelection& selection,
+    SensorProperties(Sensor& sensor, const RequestTexts& texts, const PropertySelection& selection,
         const InstanceWriter& writer, CMPIStatus* rc)
         : sensor_(sensor), texts_(texts), selection_(selection), writer_(writer), rc_(rc)
     {
@@ -167,7 +167,7 @@ private:
     }
 
     Sensor& sensor_;
-    const SensorTexts& texts_;
+    const RequestTexts& texts_;
     const PropertySelection& selection_;
     const InstanceWriter& writer_;
     CMPIStatus* rc_;

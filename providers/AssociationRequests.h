@@ -7,7 +7,6 @@
 #include "factory/BrokerCalls.h"
 #include "factory/ClassNames.h"
 #include "factory/SensorFactory.h"
-#include "platform/utilities/ProviderUtilities.h"
 #include "providers/RequestHandler.h"
 
 #include <cmpidt.h>
@@ -150,7 +149,7 @@ public:
             return status;
         }
         if (const CMPIObjectPath* const path =
-                newPath(broker_, op, served_.name, getSystemName(), &status)) {
+                newPath(broker_, op, served_.name, factory.systemName(), &status)) {
             // Evaluated once, since a different answer later would swap the ends of the pairs.
             const bool leadsToSensors = isOfClass(target, SensorClass);
             const FetchFailure failure = fetch(factory, target, leadsToSensors, farEnds, &status);

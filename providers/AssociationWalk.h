@@ -2,7 +2,6 @@
 
 #pragma once
 
-#include "platform/utilities/ProviderUtilities.h"
 #include "providers/AssociationRequests.h"
 
 #include <cmpidt.h>
@@ -56,7 +55,7 @@ protected:
         const FailureTexts& withoutPath, const Visit& visit)
     {
         const CMPIObjectPath* const path =
-            newPath(request_.broker(), op_, request_.served().name, systemName_, status_);
+            newPath(request_.broker(), op_, request_.served().name, factory_.systemName(), status_);
         if (path == nullptr) {
             request_.fail(withoutPath, status_);
             return false;
@@ -72,7 +71,6 @@ private:
     const CMPIObjectPath* op_;
     CMPIStatus* status_;
     SensorFactory factory_;
-    const std::string systemName_ = getSystemName();
     int sensorsResult_ = 0;
 };
 

@@ -66,7 +66,7 @@ private:
 
     struct Name {
         const String* string = nullptr;
-        Name* next = nullptr; // the name that was asked for after this one the last time
+        Name* next = nullptr; // the name that name() returned after this one the last time
     };
 
     Name& findName(std::string_view characters);

@@ -8,15 +8,15 @@
 
 namespace Vorn::SensorProfileProvider {
 
-// What the sensors of one request have in common: the name of their system, and the localised
-// texts, in the language that the process has when it is constructed. Thread-safe.
-class SensorTexts {
+// The texts that the objects of one request share: the name of the system, and the formats of the
+// localised texts in the language that the process has at construction. Immutable after that.
+class RequestTexts {
 public:
-    SensorTexts();
+    RequestTexts();
 
     const std::string& systemName() const { return systemName_; }
 
-    // Return the text for a sensor of that name, of at most 511 characters.
+    // Return the text for a sensor with this name, of at most 511 characters.
     std::string caption(const std::string& elementName) const;
     std::string description(const std::string& elementName) const;
 

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-#include "factory/SensorTexts.h"
+#include "factory/RequestTexts.h"
 
 #include "platform/locale/FormatText.h"
 #include "platform/locale/Locale.h"
@@ -23,7 +23,7 @@ std::string filledIn(const std::wstring& format, const std::string& elementName)
 
 } // namespace
 
-SensorTexts::SensorTexts()
+RequestTexts::RequestTexts()
 {
     const std::wstring library =
         Locale::getResourceLibrary(resourceComponent, Locale::getLanguageId());
@@ -31,12 +31,12 @@ SensorTexts::SensorTexts()
     descriptionFormat_ = ResourceString(library, L"MSGID_SENSOR_DESCRIPTION").text();
 }
 
-std::string SensorTexts::caption(const std::string& elementName) const
+std::string RequestTexts::caption(const std::string& elementName) const
 {
     return filledIn(captionFormat_, elementName);
 }
 
-std::string SensorTexts::description(const std::string& elementName) const
+std::string RequestTexts::description(const std::string& elementName) const
 {
     return filledIn(descriptionFormat_, elementName);
 }
