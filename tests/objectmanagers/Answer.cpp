@@ -58,6 +58,17 @@ std::string pathOf(const Element& element)
     return path;
 }
 
+// The text of a VALUE or VALUE.ARRAY.
+std::string quoted(const Element& value)
+{
+    if (value.is("VALUE"))
+        return '"' + value.content() + '"';
+    std::string text = "{";
+    for (const Element& element : value.children())
+        text += (text.ends_with('{') ? "\"" : ", \"") + element.content() + '"';
+    return text + '}';
+}
+
 std::optional<std::string> valueOf(const Element& property)
 {
     // After the qualifiers, which properties of classes have.
@@ -66,13 +77,7 @@ std::optional<std::string> valueOf(const Element& property)
     const Element& value = property.children().back();
     if (property.is("PROPERTY.REFERENCE"))
         return textOf(value);
-    std::string text = std::string(property.attribute("TYPE")) + ' ';
-    if (property.is("PROPERTY"))
-        return text + '"' + value.content() + '"';
-    text += '{';
-    for (const Element& element : value.children())
-        text += (text.ends_with('{') ? "\"" : ", \"") + element.content() + '"';
-    return text + '}';
+    return std::string(property.attribute("TYPE")) + ' ' + quoted(value);
 }
 
 Properties propertiesOf(const Element& instance)
@@ -85,7 +90,7 @@ Properties propertiesOf(const Element& instance)
     return properties;
 }
 
-// An object or the name of one, with a path or without.
+// An object or the name of one, with a path or without, or the value of a property.
 void add(Answer& answer, const Element& object)
 {
     if (object.is("INSTANCE"))
@@ -95,6 +100,8 @@ void add(Answer& answer, const Element& object)
     else if (object.is("VALUE.NAMEDINSTANCE") || object.is("VALUE.OBJECTWITHPATH"))
         answer.objects.emplace(
             pathOf(object.children().at(0)), propertiesOf(object.children().at(1)));
+    else if (object.is("VALUE") || object.is("VALUE.ARRAY"))
+        answer.objects.emplace(quoted(object), Properties());
     else
         answer.objects.emplace(pathOf(object), Properties());
 }

@@ -18,7 +18,8 @@ using Properties = std::map<std::string, std::optional<std::string>>;
 struct Answer {
     int error = 0; // a CIM status code; where it is not 0, there are no objects
     // By path, with sorted keys and without the host. Names of objects have no properties. What
-    // GetInstance and GetClass return has no path, but the name of the class in its place.
+    // GetInstance and GetClass return has no path, but the name of the class in its place; what
+    // GetProperty returns is the path.
     std::multimap<std::string, Properties> objects = {};
 
     bool operator==(const Answer&) const = default;

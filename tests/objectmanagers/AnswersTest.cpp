@@ -36,11 +36,9 @@ Declarations declarationsIn(const ObjectManager& manager)
     Declarations declarations;
     for (const std::string name : {"ZUMLO_NumericSensor", "ZUMLO_ComputerSystem",
              "ZUMLO_SensorEnabledLogicalElementCapabilities", "ZUMLO_SensorSystemDevice",
-             "ZUMLO_SensorElementCapabilities", "ZUMLO_SensorElementConformsToProfile"})
+             "ZUMLO_SensorElementCapabilities", "ZUMLO_SensorElementConformsToProfile",
+             "ZUMLO_SensorRegisteredProfile"})
         declarations[name] = ask({"gc", manager.url(name)}).objects.begin()->second;
-    const std::string profile = "ZUMLO_SensorRegisteredProfile";
-    declarations[profile] =
-        ask({"gc", manager.url(profile, manager.interop())}).objects.begin()->second;
     return declarations;
 }
 
@@ -75,7 +73,9 @@ public:
         if (known != serviceAnswers_.end())
             return known->second;
         const std::string url =
-            "http://127.0.0.1:" + std::to_string(service_.port()) + "/root/cimv2:" + request.object;
+            "http://127.0.0.1:" + std::to_string(service_.port()) +
+            (ObjectManager::isInterop(request.object) ? "/root/interop:" : "/root/cimv2:") +
+            request.object;
         return serviceAnswers_.emplace(request, ask(request.arguments(url))).first->second;
     }
 

@@ -2,9 +2,8 @@
 
 #include "tests/objectmanagers/Differences.h"
 
+#include "tests/objectmanagers/RequestKinds.h"
 #include "tests/support/Texts.h"
-
-#include <strings.h>
 
 #include <array>
 #include <set>
@@ -15,58 +14,6 @@ namespace Testing {
 namespace {
 
 using Result = std::optional<Equivalent>;
-
-constexpr const char* systemDevice = "ZUMLO_SensorSystemDevice";
-constexpr const char* elementCapabilities = "ZUMLO_SensorElementCapabilities";
-constexpr const char* conformance = "ZUMLO_SensorElementConformsToProfile";
-
-bool isSame(const std::string& one, const std::string& other)
-{
-    return strcasecmp(one.c_str(), other.c_str()) == 0;
-}
-
-bool isOneOf(const std::string& name, std::initializer_list<const char*> names)
-{
-    for (const char* each : names)
-        if (isSame(name, each))
-            return true;
-    return false;
-}
-
-bool isSystemDevice(const Request& request)
-{
-    return isOneOf(request.association, {systemDevice, "CIM_SystemDevice", "CIM_Component"});
-}
-
-bool isElementCapabilities(const Request& request)
-{
-    return isOneOf(request.association, {elementCapabilities, "CIM_ElementCapabilities"});
-}
-
-bool isFrom(const Request& request, const char* className)
-{
-    return request.object.starts_with(className + std::string("."));
-}
-
-bool isFromSystem(const Request& request)
-{
-    return isFrom(request, "ZUMLO_ComputerSystem");
-}
-
-bool isFromCapabilities(const Request& request)
-{
-    return isFrom(request, "ZUMLO_SensorEnabledLogicalElementCapabilities");
-}
-
-bool isFromSensor(const Request& request)
-{
-    return isFrom(request, "ZUMLO_NumericSensor");
-}
-
-bool isOnAssociations(const Request& request)
-{
-    return request.isAssociators() || request.isReferences();
-}
 
 // ---- Both
 
@@ -83,7 +30,7 @@ Equivalent byEachAssociation(Request ours, Request conforming)
 
 Result withoutRoles(const Request& request)
 {
-    if ((request.role.empty() && request.resultRole.empty()) || request.association == conformance)
+    if ((request.role.empty() && request.resultRole.empty()) || isConformance(request))
         return std::nullopt;
     Request other = request;
     other.role = other.resultRole = "";
@@ -139,14 +86,24 @@ std::vector<std::string> namesIn(const std::string& list)
 bool isWanted(const Request& request, const std::string& property)
 {
     const std::vector<std::string> names = namesIn(request.properties);
-    return names.empty() || std::any_of(names.begin(), names.end(),
-                                [&](const std::string& name) { return isSame(name, property); });
+    if (names.empty())
+        return !request.hasEmptyList;
+    return std::any_of(names.begin(), names.end(),
+        [&](const std::string& name) { return isSame(name, property); });
 }
 
 void addUnset(const Request& request, const Declarations& declarations, Answer& answer)
 {
-    if (request.operation.ends_with('n'))
+    if (request.operation.ends_with('n') || answer.error != 0)
         return;
+    if (request.operation == "gp") {
+        const Properties& declared = declarations.at(classOf(request.object));
+        const auto found = declared.find(request.properties);
+        if (answer.objects.empty() && found != declared.end() && found->second)
+            answer.objects.emplace(
+                found->second->substr(found->second->find(' ') + 1), Properties());
+        return;
+    }
     for (auto& [path, properties] : answer.objects)
         for (const auto& [name, value] : declarations.at(classOf(path)))
             if (isWanted(request, name) && !properties[name])
@@ -154,9 +111,12 @@ void addUnset(const Request& request, const Declarations& declarations, Answer& 
 }
 
 // The sensors' provider compares names as they are written.
-void dropOtherSpellings(const Request& request, const Declarations&, Answer& answer)
+void dropOtherSpellings(const Request& request, const Declarations& declarations, Answer& answer)
 {
     const std::vector<std::string> names = namesIn(request.properties);
+    if (request.operation == "gp" && isFromSensor(request) &&
+        !declarations.at("ZUMLO_NumericSensor").contains(request.properties))
+        answer.objects.clear();
     for (auto& [path, properties] : answer.objects)
         if (classOf(path) == "ZUMLO_NumericSensor" && !names.empty())
             for (auto& [name, value] : properties)
@@ -164,7 +124,21 @@ void dropOtherSpellings(const Request& request, const Declarations&, Answer& ans
                     value.reset();
 }
 
+Result notDeletingFromUnknownClasses(const Request& request)
+{
+    if (request.operation != "di" || !isFrom(request, "No_Class"))
+        return std::nullopt;
+    return Equivalent{.error = 5};
+}
+
 // ---- OpenPegasus
+
+Result withoutValueOfUnknownSensors(const Request& request)
+{
+    if (request.operation != "gp" || request.object.find("no such ") == std::string::npos)
+        return std::nullopt;
+    return Equivalent{};
+}
 
 Result refusingUnknownClasses(const Request& request)
 {
@@ -191,6 +165,22 @@ void renameInterop(const Request&, const Declarations&, Answer& answer)
 
 // ---- sfcb
 
+Result withoutSingleProperties(const Request& request)
+{
+    if ((request.operation != "gp" && request.operation != "sp") || isFrom(request, "No_Class"))
+        return std::nullopt;
+    return Equivalent{.error = 1};
+}
+
+Result withoutEmptyList(const Request& request)
+{
+    if (!request.hasEmptyList)
+        return std::nullopt;
+    Request other = request;
+    other.hasEmptyList = false;
+    return Equivalent{.requests = {other}};
+}
+
 Result notFindingAssociations(const Request& request)
 {
     if (request.association == "No_Class")
@@ -216,7 +206,7 @@ Result withAnyResultClass(const Request& request)
 
 Result withoutPropertyList(const Request& request)
 {
-    if (!request.isReferences() || request.properties.empty() || request.association == conformance)
+    if (!request.isReferences() || request.properties.empty() || isConformance(request))
         return std::nullopt;
     Request other = request;
     other.properties = "";
@@ -253,7 +243,7 @@ Result needingTheExactAssociation(const Request& request)
 {
     if (!request.isAssociators() || request.association.empty() ||
         request.association == systemDevice || request.association == elementCapabilities ||
-        request.association == conformance)
+        isConformance(request))
         return std::nullopt;
     return Equivalent{.error = isSystemDevice(request) ? 0 : 1};
 }
@@ -315,6 +305,10 @@ void dropUnwantedKeys(const Request& request, const Declarations&, Answer& answe
 constexpr std::array ofOpenPegasus = {
     Difference{"code 4 for an unknown class of the association or of the source",
         refusingUnknownClasses, nullptr},
+    Difference{"code 5 for deleting an instance of an unknown class", notDeletingFromUnknownClasses,
+        nullptr},
+    Difference{"a property of a sensor that does not exist is NULL", withoutValueOfUnknownSensors,
+        nullptr},
     Difference{"registered profiles are in root/PG_InterOp", nullptr, renameInterop},
     Difference{"sensors' associations do not apply roles", withoutRoles, nullptr},
     Difference{"without association class, each association is asked", askingEach, nullptr},
@@ -330,6 +324,10 @@ constexpr std::array ofSfcb = {
     Difference{"code 6 for an unknown class of the association", notFindingAssociations, nullptr},
     Difference{"sensors' associations do not apply roles", withoutRoles, nullptr},
     Difference{"code 1 for methods", withoutMethods, nullptr},
+    Difference{"code 1 for a single property", withoutSingleProperties, nullptr},
+    Difference{"code 5 for deleting an instance of an unknown class", notDeletingFromUnknownClasses,
+        nullptr},
+    Difference{"an empty property list counts as none", withoutEmptyList, nullptr},
     Difference{
         "an unknown result class is as good as one of other objects", withAnyResultClass, nullptr},
     Difference{"references by sensors' associations do not apply a property list",

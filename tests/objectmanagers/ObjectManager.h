@@ -28,7 +28,17 @@ public:
     {
         return this == &openPegasus() ? "root/PG_InterOp" : "root/interop";
     }
-    std::string url(const std::string& object, const std::string& space = "root/cimv2") const;
+    std::string url(const std::string& object, const std::string& space) const;
+    // Returns the URL of an object in the namespace that it is registered in by default.
+    std::string url(const std::string& object) const
+    {
+        return url(object, isInterop(object) ? interop() : "root/cimv2");
+    }
+    // Returns whether the object or class is in the namespace of registered profiles.
+    static bool isInterop(const std::string& object)
+    {
+        return object.starts_with("ZUMLO_SensorRegisteredProfile");
+    }
 
     // Starts it; its providers inherit the variables. Returns when it answers.
     void start(const std::map<std::string, std::string>& environment) const;

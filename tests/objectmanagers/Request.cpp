@@ -16,7 +16,7 @@ std::vector<std::string> Request::arguments(const std::string& url) const
         if (!value.empty())
             words.insert(words.end(), {option, value});
     words.push_back(url);
-    if (!properties.empty())
+    if (!properties.empty() || hasEmptyList)
         words.push_back(properties);
     return words;
 }

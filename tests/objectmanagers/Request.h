@@ -20,14 +20,19 @@ struct Request {
     std::string resultClass = {};
     std::string role = {};
     std::string resultRole = {};
-    std::string properties = {}; // separated by commas; the method that is invoked
+    // Separated by commas; the method that is invoked; the property that is set, with its value.
+    std::string properties = {};
+    bool hasEmptyList = false; // of properties
 
     auto operator<=>(const Request&) const = default;
 
     bool isAssociators() const { return operation == "ai" || operation == "ain"; }
     bool isReferences() const { return operation == "ri" || operation == "rin"; }
     // Returns whether it filters more than by the association.
-    bool isFiltered() const { return !(resultClass + role + resultRole + properties).empty(); }
+    bool isFiltered() const
+    {
+        return hasEmptyList || !(resultClass + role + resultRole + properties).empty();
+    }
     // Returns wbemcli's arguments, given the URL of the object.
     std::vector<std::string> arguments(const std::string& url) const;
 };
@@ -37,9 +42,9 @@ std::ostream& operator<<(std::ostream& stream, const Request& request);
 // Returns the paths of a class's objects.
 using PathsOf = std::function<std::vector<std::string>(const std::string& className)>;
 
-// Returns requests for methods and for all operations that read instances: of all classes and
-// objects, from both ends of both associations, with and without each filter, and with names that
-// fit nothing.
+// Returns requests that write, all of which are refused, requests for methods and for all
+// operations that read instances: of all classes and objects, from both ends of both associations,
+// with and without each filter, and with names that fit nothing.
 std::vector<Request> allRequests(const PathsOf& pathsOf);
 
 } // namespace Testing

@@ -13,11 +13,12 @@ using Texts = std::vector<std::string>;
 
 const Texts instanceClasses = {
     "ZUMLO_NumericSensor", "ZUMLO_ComputerSystem", "ZUMLO_SensorEnabledLogicalElementCapabilities"};
+const std::string profile = "ZUMLO_SensorRegisteredProfile";
 const Texts associationClasses = {"ZUMLO_SensorSystemDevice", "ZUMLO_SensorElementCapabilities"};
 const Texts enumeratedClasses = {"CIM_NumericSensor", "CIM_Sensor",
     "CIM_EnabledLogicalElementCapabilities", "CIM_SystemDevice", "CIM_ElementCapabilities",
     "zumlo_numericsensor", "zumlo_SENSORsystemdevice", "ZUMLO_SensorElementConformsToProfile",
-    "No_Class"};
+    "CIM_ElementConformsToProfile", "No_Class"};
 
 // Each is asked for alone or with others, in its own spelling or another one.
 const Texts propertyLists = {"Caption", "caption", "Status", "HealthState,Status",
@@ -29,7 +30,7 @@ const Texts endLists = {"GroupComponent", "groupcomponent", "GroupComponent,Part
 
 const Texts associations = {"", "ZUMLO_SensorSystemDevice", "ZUMLO_SensorElementCapabilities",
     "ZUMLO_SensorElementConformsToProfile", "CIM_SystemDevice", "CIM_ElementCapabilities",
-    "CIM_Component", "zumlo_sensorsystemdevice", "No_Class"};
+    "CIM_ElementConformsToProfile", "CIM_Component", "zumlo_sensorsystemdevice", "No_Class"};
 const Texts resultClasses = {"", "ZUMLO_NumericSensor", "ZUMLO_ComputerSystem",
     "ZUMLO_SensorEnabledLogicalElementCapabilities", "CIM_System", "CIM_Sensor",
     "CIM_ManagedElement", "zumlo_computersystem", "No_Class"};
@@ -37,14 +38,38 @@ const std::vector<std::pair<std::string, std::string>> roles = {{"PartComponent"
     {"GroupComponent", ""}, {"", "PartComponent"}, {"", "Capabilities"},
     {"managedelement", "Capabilities"}, {"PartComponent", "groupcomponent"}};
 
+// Each object manager refuses them, and answers what follows as if they had not been sent.
+// Before it modifies an instance, wbemcli looks for the property in it.
+void addRefused(std::vector<Request>& requests, const std::string& path,
+    const std::string& assignment = "Caption=x")
+{
+    for (const std::string operation : {"ci", "mi", "sp"})
+        requests.push_back({.operation = operation, .object = path, .properties = assignment});
+    requests.push_back({"di", path});
+}
+
+void addSingleProperties(std::vector<Request>& requests, const std::string& path)
+{
+    for (const std::string property : {"CurrentReading", "PossibleStates", "DeviceID", "caption",
+             "Status", "EnabledDefault", "No_Property"})
+        requests.push_back({.operation = "gp", .object = path, .properties = property});
+}
+
+void addEmptyLists(
+    std::vector<Request>& requests, const std::string& className, const std::string& path)
+{
+    requests.push_back({.operation = "ei", .object = className, .hasEmptyList = true});
+    requests.push_back({.operation = "gi", .object = path, .hasEmptyList = true});
+}
+
 void addEnumerations(std::vector<Request>& requests)
 {
-    for (const Texts& classes : {instanceClasses, associationClasses, enumeratedClasses})
+    for (const Texts& classes : {instanceClasses, {profile}, associationClasses, enumeratedClasses})
         for (const std::string& name : classes)
             for (const std::string operation : {"ein", "ei"})
                 requests.push_back({operation, name});
-    for (const auto& [classes, lists] :
-        {std::pair(instanceClasses, propertyLists), {associationClasses, endLists}})
+    for (const auto& [classes, lists] : {std::pair(instanceClasses, propertyLists),
+             {{profile}, propertyLists}, {associationClasses, endLists}})
         for (const std::string& name : classes)
             for (const std::string& list : lists)
                 requests.push_back({.operation = "ei", .object = name, .properties = list});
@@ -52,8 +77,8 @@ void addEnumerations(std::vector<Request>& requests)
 
 void addObjects(std::vector<Request>& requests, const PathsOf& pathsOf)
 {
-    for (const auto& [classes, lists] :
-        {std::pair(instanceClasses, propertyLists), {associationClasses, endLists}})
+    for (const auto& [classes, lists] : {std::pair(instanceClasses, propertyLists),
+             {{profile}, propertyLists}, {associationClasses, endLists}})
         for (const std::string& name : classes) {
             const Texts paths = pathsOf(name);
             for (const std::string& path : paths)
@@ -105,12 +130,27 @@ void addFiltered(std::vector<Request>& requests, const std::string& path)
 std::vector<Request> allRequests(const PathsOf& pathsOf)
 {
     std::vector<Request> requests;
+    const std::string sensor = pathsOf("ZUMLO_NumericSensor").at(0);
+    const std::string noSensor = replaced(sensor, "DeviceID=\"", "DeviceID=\"no such ");
+    const std::string ofNoClass = "No_Class.Key=\"1\"";
+    for (const std::string& path : {sensor, noSensor, ofNoClass}) {
+        addRefused(requests, path);
+        addSingleProperties(requests, path);
+    }
     addEnumerations(requests);
     addObjects(requests, pathsOf);
-    addMethods(requests, "No_Class.Key=\"1\"");
-    addOtherPaths(requests, pathsOf("ZUMLO_NumericSensor").at(0));
+    addMethods(requests, ofNoClass);
+    addOtherPaths(requests, sensor);
+    addRefused(requests, pathsOf(profile).at(0), "ElementName=x");
+    addEmptyLists(requests, profile, pathsOf(profile).at(0));
     for (const std::string& name : instanceClasses) {
         const Texts paths = pathsOf(name);
+        addRefused(requests, paths.at(0),
+            name.ends_with("Capabilities") ? "ElementNameEditSupported=true" : "Caption=x");
+        addEmptyLists(requests, name, paths.at(0));
+        for (const std::string operation : {"ai", "ri"})
+            requests.push_back(
+                {.operation = operation, .object = paths.at(0), .hasEmptyList = true});
         addMethods(requests, paths.at(0));
         addFiltered(requests, paths.at(0));
         for (const std::string& path : paths)
