@@ -8,6 +8,7 @@
 #include "tests/support/Environment.h"
 #include "tests/support/TemporaryFolder.h"
 
+#include <array>
 #include <chrono>
 #include <cstdint>
 #include <string>
@@ -37,16 +38,17 @@ public:
 private:
     static std::string content(std::int64_t sensors)
     {
-        static const char* const types[] = {"temperature", "voltage", "tachometer"};
-        std::string text = "{\"nodes\": [";
+        constexpr std::array<const char*, 3> types = {"temperature", "voltage", "tachometer"};
+        std::string text = R"({"nodes": [)";
         for (std::int64_t i = 0; i < sensors; ++i) {
             const std::string number = std::to_string(i);
-            text += (i == 0 ? "" : ",\n");
-            text += "{\"type\": \"" + std::string(types[i % 3]) + "\", \"path\": \"/board/" +
-                    number + "\", \"description\": \"Sensor " + number +
-                    "\", \"status\": 1, \"possibleStates\": [1, 23, 26], \"baseUnits\": 2, "
-                    "\"reading\": 41.5, \"lowerNonCritical\": 5, \"upperNonCritical\": 80, "
-                    "\"lowerCritical\": 1, \"upperCritical\": 95}";
+            text += i == 0 ? "" : ",\n";
+            text += R"({"type": ")";
+            text += types.at(static_cast<std::size_t>(i) % types.size());
+            text += R"(", "path": "/board/)" + number + R"(", "description": "Sensor )" + number +
+                    R"(", "status": 1, "possibleStates": [1, 23, 26], "baseUnits": 2, )"
+                    R"("reading": 41.5, "lowerNonCritical": 5, "upperNonCritical": 80, )"
+                    R"("lowerCritical": 1, "upperCritical": 95})";
         }
         return text + "]}";
     }
