@@ -24,8 +24,8 @@ using Bench::reportPerObject;
 constexpr const char* SensorClass = "ZUMLO_NumericSensor";
 constexpr const char* SystemClass = "ZUMLO_ComputerSystem";
 constexpr const char* CapabilitiesClass = "ZUMLO_SensorEnabledLogicalElementCapabilities";
-constexpr const char* ElementCapabilities = "ZUMLO_SensorElementCapabilities";
-constexpr const char* SystemDevice = "ZUMLO_SensorSystemDevice";
+constexpr const char* elementCapabilities = "ZUMLO_SensorElementCapabilities";
+constexpr const char* systemDevice = "ZUMLO_SensorSystemDevice";
 
 // Answers up-calls with the given number of computer systems.
 class Systems : public Host::BrokerUpcalls {
@@ -69,7 +69,7 @@ template <typename Handler>
 void enumerateAssociation(benchmark::State& state, const char* className, const Handler& handler)
 {
     Systems systems(state.range(1));
-    const auto create = std::string_view(className) == SystemDevice
+    const auto create = std::string_view(className) == systemDevice
                             ? SensorSystemDeviceProvider_Create_InstanceMI
                             : SensorElementCapabilitiesProvider_Create_InstanceMI;
     const std::int64_t objects = state.range(0) * state.range(1);
@@ -101,7 +101,7 @@ void associate(benchmark::State& state, const char* sourceClass, const char* ass
     std::int64_t objects, const Handler& handler)
 {
     Systems systems(state.range(1));
-    const auto create = std::string_view(associationClass) == SystemDevice
+    const auto create = std::string_view(associationClass) == systemDevice
                             ? SensorSystemDeviceProvider_Create_AssociationMI
                             : SensorElementCapabilitiesProvider_Create_AssociationMI;
     handle(create, &systems, sourceClass, objects, state, handler);
@@ -154,24 +154,24 @@ void systemSizes(benchmark::internal::Benchmark* benchmark)
     benchmark->ArgsProduct({{10, 100, 1000, 10000}, {1, 4}})->Unit(benchmark::kMicrosecond);
 }
 
-BENCHMARK_CAPTURE(enumerateNames, ElementCapabilities, ElementCapabilities)
+BENCHMARK_CAPTURE(enumerateNames, ElementCapabilities, elementCapabilities)
     ->Apply(capabilitiesSizes);
-BENCHMARK_CAPTURE(enumerateInstances, ElementCapabilities, ElementCapabilities)
+BENCHMARK_CAPTURE(enumerateInstances, ElementCapabilities, elementCapabilities)
     ->Apply(capabilitiesSizes);
-BENCHMARK_CAPTURE(associators, ElementCapabilities, CapabilitiesClass, ElementCapabilities)
+BENCHMARK_CAPTURE(associators, ElementCapabilities, CapabilitiesClass, elementCapabilities)
     ->Apply(capabilitiesSizes);
-BENCHMARK_CAPTURE(associatorNames, ElementCapabilities, CapabilitiesClass, ElementCapabilities)
+BENCHMARK_CAPTURE(associatorNames, ElementCapabilities, CapabilitiesClass, elementCapabilities)
     ->Apply(capabilitiesSizes);
-BENCHMARK_CAPTURE(references, ElementCapabilities, CapabilitiesClass, ElementCapabilities)
+BENCHMARK_CAPTURE(references, ElementCapabilities, CapabilitiesClass, elementCapabilities)
     ->Apply(capabilitiesSizes);
-BENCHMARK_CAPTURE(referenceNames, ElementCapabilities, CapabilitiesClass, ElementCapabilities)
+BENCHMARK_CAPTURE(referenceNames, ElementCapabilities, CapabilitiesClass, elementCapabilities)
     ->Apply(capabilitiesSizes);
 
-BENCHMARK_CAPTURE(enumerateNames, SystemDevice, SystemDevice)->Apply(systemSizes);
-BENCHMARK_CAPTURE(enumerateInstances, SystemDevice, SystemDevice)->Apply(systemSizes);
-BENCHMARK_CAPTURE(associators, SystemDevice, SystemClass, SystemDevice)->Apply(systemSizes);
-BENCHMARK_CAPTURE(associatorNames, SystemDevice, SystemClass, SystemDevice)->Apply(systemSizes);
-BENCHMARK_CAPTURE(references, SystemDevice, SystemClass, SystemDevice)->Apply(systemSizes);
-BENCHMARK_CAPTURE(referenceNames, SystemDevice, SystemClass, SystemDevice)->Apply(systemSizes);
+BENCHMARK_CAPTURE(enumerateNames, SystemDevice, systemDevice)->Apply(systemSizes);
+BENCHMARK_CAPTURE(enumerateInstances, SystemDevice, systemDevice)->Apply(systemSizes);
+BENCHMARK_CAPTURE(associators, SystemDevice, SystemClass, systemDevice)->Apply(systemSizes);
+BENCHMARK_CAPTURE(associatorNames, SystemDevice, SystemClass, systemDevice)->Apply(systemSizes);
+BENCHMARK_CAPTURE(references, SystemDevice, SystemClass, systemDevice)->Apply(systemSizes);
+BENCHMARK_CAPTURE(referenceNames, SystemDevice, SystemClass, systemDevice)->Apply(systemSizes);
 
 } // namespace

@@ -17,7 +17,7 @@
 
 namespace Bench {
 
-inline constexpr const char* NameSpace = "root/cimv2";
+inline constexpr const char* testNameSpace = "root/cimv2";
 
 inline void reportPerObject(benchmark::State& state, std::int64_t objects)
 {
@@ -42,7 +42,7 @@ void handle(const Create& create, Host::BrokerUpcalls* upcalls, const char* clas
         Host::CollectedResult answer;
         Host::Result result(answer);
         const CMPIStatus status =
-            handler(mi, request, result, request.makePath(NameSpace, className));
+            handler(mi, request, result, request.makePath(testNameSpace, className));
         const auto answered = answer.instances().size() + answer.paths().size();
         if (status.rc != CMPI_RC_OK || answered != static_cast<std::size_t>(objects)) {
             state.SkipWithError("the request failed or its answer is not whole");

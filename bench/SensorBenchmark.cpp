@@ -22,8 +22,8 @@ namespace {
 using namespace Vorn::SensorProfileProvider;
 using Bench::handle;
 using Bench::ModelMachine;
-using Bench::NameSpace;
 using Bench::reportPerObject;
+using Bench::testNameSpace;
 
 constexpr const char* Class = "ZUMLO_NumericSensor";
 
@@ -93,7 +93,7 @@ void Building(benchmark::State& state)
         std::vector<CMPIInstance*> instances;
         CMPIStatus status = {CMPI_RC_OK, nullptr};
         factory.getAllSensorCMPIInstances(broker.handle(),
-            request.makePath(NameSpace, Class).handle(), nullptr, false, instances, &status);
+            request.makePath(testNameSpace, Class).handle(), nullptr, false, instances, &status);
         benchmark::DoNotOptimize(instances.data());
     }
     reportPerObject(state, state.range(0));
@@ -101,14 +101,14 @@ void Building(benchmark::State& state)
 
 // ---- One trace point ----
 
-const std::string Component = "Nimbrel.Bench";
+const std::string component = "Nimbrel.Bench";
 
 void TracePoint(benchmark::State& state, const RynLog::LogSettings& configuration)
 {
     RynLog::configure(configuration);
     const int object = 0;
     for (auto _ : state) {
-        const Vorn::TracedOperation traced({Component, "Bench"}, "makeSensorInstance", [&] {
+        const Vorn::TracedOperation traced({component, "Bench"}, "makeSensorInstance", [&] {
             return Vorn::parameterList(" broker=", &object, " ref=", &object, " snsr=", &object,
                 " properties=", &object, " isObjPath=", false, " rc=", &object);
         });

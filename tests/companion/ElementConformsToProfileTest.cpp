@@ -17,8 +17,8 @@ using Testing::ScriptedObjects;
 using ::testing::SizeIs;
 
 constexpr const char* Class = "ZUMLO_SensorElementConformsToProfile";
-constexpr const char* Interop = "root/interop";
-constexpr const char* Cimv2 = "root/cimv2";
+constexpr const char* interop = "root/interop";
+constexpr const char* cimv2 = "root/cimv2";
 
 struct Filters {
     const char* associationClass = nullptr;
@@ -39,12 +39,12 @@ protected:
 
     const CMPIObjectPath* profile(const char* id = "ZUMLO:DSP1009")
     {
-        return path(ScriptedObjects::ProfileClass, {{"InstanceID", id}}, Interop).handle();
+        return path(ScriptedObjects::ProfileClass, {{"InstanceID", id}}, interop).handle();
     }
 
     const CMPIObjectPath* sensor(const char* id)
     {
-        return path(ScriptedObjects::SensorClass, {{"DeviceID", id}}, Cimv2).handle();
+        return path(ScriptedObjects::SensorClass, {{"DeviceID", id}}, cimv2).handle();
     }
 
     const CMPIObjectPath* classIn(const char* nameSpace)
@@ -161,7 +161,7 @@ constexpr const char* fanPath = "root/cimv2:ZUMLO_NumericSensor.DeviceID=\"Fan\"
 
 TEST_F(ElementConformsToProfileTest, EnumerationHasAnAssociationForEachSensorInEitherNamespace)
 {
-    for (const char* const nameSpace : {Interop, Cimv2}) {
+    for (const char* const nameSpace : {interop, cimv2}) {
         const Reply reply = enumerateNames(nameSpace);
         EXPECT_EQ(reply.status.rc, CMPI_RC_OK);
         EXPECT_TRUE(reply.found.isDone());
@@ -177,9 +177,9 @@ TEST_F(ElementConformsToProfileTest, EnumerationHasAnAssociationForEachSensorInE
 TEST_F(ElementConformsToProfileTest, InstancesHaveBothReferencesWhateverIsListed)
 {
     const char* properties[] = {"Unheard", nullptr};
-    for (const Reply& reply : {enumerate(Interop, properties), references(profile(), properties)}) {
+    for (const Reply& reply : {enumerate(interop, properties), references(profile(), properties)}) {
         ASSERT_THAT(reply.found.instances(), SizeIs(2));
-        EXPECT_EQ(reply.found.instances()[1]->nameSpace(), Interop);
+        EXPECT_EQ(reply.found.instances()[1]->nameSpace(), interop);
         EXPECT_THAT(Testing::namesOf(reply.found.instances()[1]->properties()),
             ElementsAre("ConformantStandard", "ManagedElement"));
     }
@@ -200,7 +200,7 @@ TEST_F(ElementConformsToProfileTest, TheNamespacesAreThoseOfTheObjectManager)
 TEST_F(ElementConformsToProfileTest, PathsOfUpcallsGetTheNamespaceThatTheyLack)
 {
     objects_.givesNameSpaces = false;
-    const Reply reply = enumerateNames(Interop);
+    const Reply reply = enumerateNames(interop);
     ASSERT_THAT(reply.found.paths(), SizeIs(2));
     EXPECT_EQ(end(reply.found.paths()[1], "ConformantStandard"), profilePath);
     EXPECT_EQ(end(reply.found.paths()[1], "ManagedElement"), fanPath);
@@ -212,7 +212,7 @@ TEST_F(ElementConformsToProfileTest, WithoutARegistrationNothingConforms)
     for (const CMPIrc code : {CMPI_RC_ERR_INVALID_CLASS, CMPI_RC_ERR_INVALID_NAMESPACE,
              CMPI_RC_ERR_NOT_FOUND, CMPI_RC_ERR_NOT_SUPPORTED}) {
         objects_.missing = code;
-        for (const Reply& reply : {enumerateNames(Cimv2), associatorNames(sensor("CPU"))}) {
+        for (const Reply& reply : {enumerateNames(cimv2), associatorNames(sensor("CPU"))}) {
             EXPECT_EQ(reply.status.rc, CMPI_RC_OK);
             EXPECT_THAT(pathsIn(reply), IsEmpty());
         }
@@ -222,7 +222,7 @@ TEST_F(ElementConformsToProfileTest, WithoutARegistrationNothingConforms)
 TEST_F(ElementConformsToProfileTest, AFailureToEnumerateTheSensorsIsReported)
 {
     objects_.sensorFailure = CMPI_RC_ERR_FAILED;
-    for (const Reply& reply : {enumerateNames(Interop), associators(profile())}) {
+    for (const Reply& reply : {enumerateNames(interop), associators(profile())}) {
         EXPECT_EQ(reply.status.rc, CMPI_RC_ERR_FAILED);
         EXPECT_EQ(Testing::textOf(reply.status.msg),
             "the instances of ZUMLO_NumericSensor cannot be enumerated");
@@ -232,7 +232,7 @@ TEST_F(ElementConformsToProfileTest, AFailureToEnumerateTheSensorsIsReported)
 
 TEST_F(ElementConformsToProfileTest, EachNameFindsItsInstance)
 {
-    const Reply names = enumerateNames(Interop);
+    const Reply names = enumerateNames(interop);
     ASSERT_THAT(names.found.paths(), SizeIs(2));
     for (const Host::ObjectPath* const name : names.found.paths()) {
         const Reply reply = get(*name);
@@ -244,7 +244,7 @@ TEST_F(ElementConformsToProfileTest, EachNameFindsItsInstance)
 
 TEST_F(ElementConformsToProfileTest, AnUnknownSensorConformsToNothing)
 {
-    Host::ObjectPath& unknown = path(Class, {}, Interop);
+    Host::ObjectPath& unknown = path(Class, {}, interop);
     unknown.addKey("ConformantStandard", Host::Value::of(*Host::ObjectPath::of(profile())));
     unknown.addKey("ManagedElement", Host::Value::of(*Host::ObjectPath::of(sensor("none"))));
     const Reply reply = get(unknown);
@@ -277,7 +277,7 @@ TEST_F(ElementConformsToProfileTest, ASensorLeadsToTheProfile)
     EXPECT_THAT(pathsIn(associatorNames(sensor("Fan"))), ElementsAre(profilePath));
     const Reply names = referenceNames(sensor("Fan"));
     ASSERT_THAT(names.found.paths(), SizeIs(1));
-    EXPECT_EQ(names.found.paths()[0]->nameSpace(), Cimv2);
+    EXPECT_EQ(names.found.paths()[0]->nameSpace(), cimv2);
     EXPECT_EQ(end(names.found.paths()[0], "ManagedElement"), fanPath);
 }
 
@@ -286,7 +286,7 @@ TEST_F(ElementConformsToProfileTest, ASensorLeadsToTheProfilesInstanceWithTheLis
     const char* properties[] = {"RegisteredName", nullptr};
     const Reply reply = associators(sensor("Fan"), properties);
     ASSERT_THAT(reply.found.instances(), SizeIs(1));
-    EXPECT_EQ(reply.found.instances()[0]->nameSpace(), Interop);
+    EXPECT_EQ(reply.found.instances()[0]->nameSpace(), interop);
     EXPECT_THAT(Testing::namesOf(reply.found.instances()[0]->properties()),
         ElementsAre("InstanceID", "RegisteredName"));
 }
@@ -338,7 +338,7 @@ TEST_F(ElementConformsToProfileTest, AFailingBrokerIsSurvivedAndNothingIsMadeUp)
 {
     Testing::sweepFaults(broker_, [&](Testing::FaultyBroker& faulty) {
         asked_ = faulty.handle();
-        for (const Reply& reply : {enumerateNames(Interop), enumerate(Cimv2, nullptr),
+        for (const Reply& reply : {enumerateNames(interop), enumerate(cimv2, nullptr),
                  associatorNames(profile()), associators(profile()), associators(sensor("CPU")),
                  referenceNames(sensor("Fan"))}) {
             EXPECT_EQ(reply.found.refused(), 0U);

@@ -12,7 +12,7 @@ namespace RegisteredProfileTests {
 using ::testing::ElementsAre;
 
 constexpr const char* Class = "ZUMLO_SensorRegisteredProfile";
-constexpr const char* Interop = "root/PG_InterOp";
+constexpr const char* interop = "root/PG_InterOp";
 
 class RegisteredProfileTest : public Testing::ProviderTest {
 protected:
@@ -24,7 +24,7 @@ protected:
     CMPIStatus get(const std::string& id, const char** properties = nullptr)
     {
         return mi_->ft->getInstance(mi_, context(), result(),
-            path(Class, {{"InstanceID", id}}, Interop).handle(), properties);
+            path(Class, {{"InstanceID", id}}, interop).handle(), properties);
     }
 
     CMPIInstanceMI* mi_;
@@ -33,7 +33,7 @@ protected:
 TEST_F(RegisteredProfileTest, HasEveryPropertyThatTheStandardRequires)
 {
     const CMPIStatus status = mi_->ft->enumerateInstances(
-        mi_, context(), result(), path(Class, {}, Interop).handle(), nullptr);
+        mi_, context(), result(), path(Class, {}, interop).handle(), nullptr);
     EXPECT_EQ(status.rc, CMPI_RC_OK);
     ASSERT_EQ(answer_.instances().size(), 1U);
     EXPECT_THAT(Testing::describe(answer_.instances()[0]->properties()),
@@ -45,7 +45,7 @@ TEST_F(RegisteredProfileTest, HasEveryPropertyThatTheStandardRequires)
 
 TEST_F(RegisteredProfileTest, HasOneNameInTheNamespaceOfTheRequest)
 {
-    mi_->ft->enumerateInstanceNames(mi_, context(), result(), path(Class, {}, Interop).handle());
+    mi_->ft->enumerateInstanceNames(mi_, context(), result(), path(Class, {}, interop).handle());
     ASSERT_EQ(answer_.paths().size(), 1U);
     EXPECT_EQ(answer_.paths()[0]->toText(),
         "//" + systemName_ +

@@ -16,8 +16,8 @@ using namespace Vorn;
 using Testing::LogCapture;
 using Testing::LogLine;
 
-const std::string Component = "Nimbrel.Test";
-const std::string Separator(78, '=');
+const std::string component = "Nimbrel.Test";
+const std::string separator(78, '=');
 
 TEST(TraceTest, EachTypeHasItsFormat)
 {
@@ -90,10 +90,10 @@ TEST(TraceTest, EachThreadHasBuffersOfItsOwn)
 TEST(MarksTest, TheEntryMarkIsASeparatorAndAnEnteringLine)
 {
     const LogCapture capture;
-    markProviderEntry(Component, "Sensor_GetInstance", "SensorProvider", 192);
+    markProviderEntry(component, "Sensor_GetInstance", "SensorProvider", 192);
     const std::vector<LogLine> expected = {
-        {"log", 4000, Component, "markProviderEntry", "Trace", 336, Separator},
-        {"log", 4000, Component, "markProviderEntry", "Trace", 337,
+        {"log", 4000, component, "markProviderEntry", "Trace", 336, separator},
+        {"log", 4000, component, "markProviderEntry", "Trace", 337,
             "ENTERING: Sensor_GetInstance() in SensorProvider [Line: 192]"}};
     EXPECT_EQ(capture.log(), expected);
 }
@@ -101,20 +101,20 @@ TEST(MarksTest, TheEntryMarkIsASeparatorAndAnEnteringLine)
 TEST(MarksTest, TheExitMarkIsAnExitingLineAndASeparator)
 {
     const LogCapture capture;
-    markProviderExit(Component, "Sensor_GetInstance", "SensorProvider", 293);
+    markProviderExit(component, "Sensor_GetInstance", "SensorProvider", 293);
     const std::vector<LogLine> expected = {
-        {"log", 4000, Component, "markProviderExit", "Trace", 348,
+        {"log", 4000, component, "markProviderExit", "Trace", 348,
             "EXITING: Sensor_GetInstance() in SensorProvider [Line: 293]"},
-        {"log", 4000, Component, "markProviderExit", "Trace", 349, Separator}};
+        {"log", 4000, component, "markProviderExit", "Trace", 349, separator}};
     EXPECT_EQ(capture.log(), expected);
 }
 
 TEST(MarksTest, TheTraceChannelReceivesTheSameLinesAsTheLogChannel)
 {
     const LogCapture capture;
-    markProviderEntry(Component, "f", "F", 1);
-    traceMessage({Component, "F"}, "f", 2, "failed");
-    markProviderExit(Component, "f", "F", 3);
+    markProviderEntry(component, "f", "F", 1);
+    traceMessage({component, "F"}, "f", 2, "failed");
+    markProviderExit(component, "f", "F", 3);
     auto expected = capture.log();
     ASSERT_EQ(expected.size(), 5U);
     for (LogLine& line : expected)
@@ -127,7 +127,7 @@ TEST(MarksTest, TheLogChannelReceivesALineBeforeTheTraceChannel)
     const Testing::TemporaryFolder folder;
     const std::filesystem::path both = folder.path() / "both";
     RynLog::configure({0, "file:" + both.string(), "file:" + both.string()});
-    traceMessage({Component, "F"}, "f", 2, "failed");
+    traceMessage({component, "F"}, "f", 2, "failed");
     RynLog::configure({6000, "off", "off"});
     std::ifstream lines(both);
     std::vector<std::string> channels;
@@ -140,14 +140,14 @@ TEST(TracedOperationTest, MarksCarryTheParameterListAtLevel3000)
 {
     const LogCapture capture;
     const int* const nothing = nullptr;
-    const TracedOperation traced({Component, "F"}, "f",
+    const TracedOperation traced({component, "F"}, "f",
         [&] { return parameterList(" isSen=", true, " isCap=", false, " ref=", nothing); });
     traced.entering(10);
     traced.exiting(20);
     const std::vector<LogLine> expected = {
-        {"log", 3000, Component, "f", "F", 10,
+        {"log", 3000, component, "f", "F", 10,
             "ENTERING: f() in F [Line: 10],Parameters List:  isSen=1 isCap=0 ref=0"},
-        {"log", 3000, Component, "f", "F", 20,
+        {"log", 3000, component, "f", "F", 20,
             "EXITING: f() in F [Line: 20],Parameters List:  isSen=1 isCap=0 ref=0"}};
     EXPECT_EQ(capture.log(), expected);
 }
@@ -155,19 +155,19 @@ TEST(TracedOperationTest, MarksCarryTheParameterListAtLevel3000)
 TEST(TracedOperationTest, PlainMarksHaveLevel4000)
 {
     const LogCapture capture;
-    const TracedOperation traced({Component, "F"}, "f");
+    const TracedOperation traced({component, "F"}, "f");
     traced.entering(10);
     traced.exiting(20);
     const std::vector<LogLine> expected = {
-        {"log", 4000, Component, "f", "F", 10, "ENTERING: f() in F [Line: 10]"},
-        {"log", 4000, Component, "f", "F", 20, "EXITING: f() in F [Line: 20]"}};
+        {"log", 4000, component, "f", "F", 10, "ENTERING: f() in F [Line: 10]"},
+        {"log", 4000, component, "f", "F", 20, "EXITING: f() in F [Line: 20]"}};
     EXPECT_EQ(capture.log(), expected);
 }
 
 TEST(TracedOperationTest, AMarkWithoutALineNumberCarriesItsSourceLine)
 {
     const LogCapture capture;
-    const TracedOperation traced({Component, "F"}, "f");
+    const TracedOperation traced({component, "F"}, "f");
     traced.entering();
     const unsigned here = __LINE__ - 1;
     ASSERT_EQ(capture.log().size(), 1U);
@@ -177,8 +177,8 @@ TEST(TracedOperationTest, AMarkWithoutALineNumberCarriesItsSourceLine)
 TEST(TracedOperationTest, AFailureIsAMessageLineAtLevel6000)
 {
     const LogCapture capture;
-    traceMessage({Component, "F"}, "f", 94, "getAllSensorCMPIObjPaths failed");
-    const std::vector<LogLine> expected = {{"log", 6000, Component, "f", "F", 94,
+    traceMessage({component, "F"}, "f", 94, "getAllSensorCMPIObjPaths failed");
+    const std::vector<LogLine> expected = {{"log", 6000, component, "f", "F", 94,
         "MESSAGE [File: F, Line: 94]: getAllSensorCMPIObjPaths failed"}};
     EXPECT_EQ(capture.log(), expected);
 }
@@ -187,7 +187,7 @@ TEST(TracedOperationTest, AParameterListIsNotComposedWhenNobodyWantsIt)
 {
     const LogCapture capture(6000);
     bool composed = false;
-    const TracedOperation traced({Component, "F"}, "f", [&] {
+    const TracedOperation traced({component, "F"}, "f", [&] {
         composed = true;
         return std::string();
     });

@@ -16,11 +16,11 @@ using Vorn::SensorProfileProvider::SensorFactory;
 using namespace ::testing;
 using namespace Testing;
 
-constexpr const char* Sensor = "ZUMLO_NumericSensor";
-constexpr const char* System = "ZUMLO_ComputerSystem";
-constexpr const char* Capabilities = "ZUMLO_SensorEnabledLogicalElementCapabilities";
-constexpr const char* SystemDevice = "ZUMLO_SensorSystemDevice";
-constexpr const char* ElementCapabilities = "ZUMLO_SensorElementCapabilities";
+constexpr const char* numericSensor = "ZUMLO_NumericSensor";
+constexpr const char* computerSystem = "ZUMLO_ComputerSystem";
+constexpr const char* capabilities = "ZUMLO_SensorEnabledLogicalElementCapabilities";
+constexpr const char* systemDevice = "ZUMLO_SensorSystemDevice";
+constexpr const char* elementCapabilities = "ZUMLO_SensorElementCapabilities";
 
 struct Row {
     const char* name;
@@ -32,14 +32,14 @@ struct Row {
     int exitLine;
 };
 
-const Row Rows[] = {
-    {"fromASystemToItsSensors", System, SystemDevice, Sensor, "SensorSystemDeviceProvider",
-        "Target Class is PhysicalPackageClass", 1205},
-    {"fromASensorToItsSystem", Sensor, SystemDevice, System, "SensorSystemDeviceProvider",
-        "Target Class is ComputerSystemClass", 1221},
-    {"fromASensorToItsCapabilities", Sensor, ElementCapabilities, Capabilities,
+const Row rows[] = {
+    {"fromASystemToItsSensors", computerSystem, systemDevice, numericSensor,
+        "SensorSystemDeviceProvider", "Target Class is PhysicalPackageClass", 1205},
+    {"fromASensorToItsSystem", numericSensor, systemDevice, computerSystem,
+        "SensorSystemDeviceProvider", "Target Class is ComputerSystemClass", 1221},
+    {"fromASensorToItsCapabilities", numericSensor, elementCapabilities, capabilities,
         "SensorElementCapabilitiesProvider", "Target Class is PhysicalPackageClass", 1236},
-    {"fromCapabilitiesToTheirSensors", Capabilities, ElementCapabilities, Sensor,
+    {"fromCapabilitiesToTheirSensors", capabilities, elementCapabilities, numericSensor,
         "SensorElementCapabilitiesProvider", "Target Class is ComputerSystemClass", 1252},
 };
 
@@ -77,7 +77,7 @@ protected:
     BrokerMessage message() const { return {1, GetParam().component, GetParam().text}; }
 };
 
-INSTANTIATE_TEST_SUITE_P(All, AssociationRowTest, ValuesIn(Rows),
+INSTANTIATE_TEST_SUITE_P(All, AssociationRowTest, ValuesIn(rows),
     [](const TestParamInfo<Row>& row) { return row.param.name; });
 
 // ---- The four ends ----
@@ -103,7 +103,7 @@ TEST_P(AssociationRowTest, MakesAKeylessPathInTheSourcesNamespaceOnThisSystem)
 
 TEST_P(AssociationRowTest, DoesNotLookAtTheResultClass)
 {
-    for (const char* const resultClass : {"", "CIM_ComputerSystem", Sensor, "NOT_AClass"}) {
+    for (const char* const resultClass : {"", "CIM_ComputerSystem", numericSensor, "NOT_AClass"}) {
         EXPECT_STREQ(
             nameFrom(GetParam().source, GetParam().association, resultClass), GetParam().target);
         EXPECT_NE(pathFrom(GetParam().source, GetParam().association, resultClass), nullptr);
@@ -173,15 +173,15 @@ TEST_P(AssociationRowTest, APathTheBrokerDoesNotMakeIsNoTarget)
 
 TEST_F(AssociationTargetTest, AnotherProvidersEndHasNoTarget)
 {
-    expectNoTarget(System, ElementCapabilities);
-    expectNoTarget(Capabilities, SystemDevice);
-    expectNoTarget(SystemDevice, SystemDevice);
-    expectNoTarget(ElementCapabilities, ElementCapabilities);
-    expectNoTarget("CIM_NumericSensor", SystemDevice);
-    expectNoTarget("CIM_ComputerSystem", SystemDevice);
-    expectNoTarget(Sensor, "CIM_SystemDevice");
-    expectNoTarget(Sensor, Sensor);
-    expectNoTarget("OTHER_Class", ElementCapabilities);
+    expectNoTarget(computerSystem, elementCapabilities);
+    expectNoTarget(capabilities, systemDevice);
+    expectNoTarget(systemDevice, systemDevice);
+    expectNoTarget(elementCapabilities, elementCapabilities);
+    expectNoTarget("CIM_NumericSensor", systemDevice);
+    expectNoTarget("CIM_ComputerSystem", systemDevice);
+    expectNoTarget(numericSensor, "CIM_SystemDevice");
+    expectNoTarget(numericSensor, numericSensor);
+    expectNoTarget("OTHER_Class", elementCapabilities);
 }
 
 TEST_F(AssociationTargetTest, NoTargetLeavesTheTextOfTheStatusToTheCaller)
@@ -189,11 +189,11 @@ TEST_F(AssociationTargetTest, NoTargetLeavesTheTextOfTheStatusToTheCaller)
     // The broker's calls succeed and set the status to OK; the factory does not set it.
     CMPIStatus* const none = nullptr;
     EXPECT_EQ(SensorFactory::get_assoc_targetClass_Name(
-                  broker(), path(System).handle(), ElementCapabilities, nullptr, none),
+                  broker(), path(computerSystem).handle(), elementCapabilities, nullptr, none),
         nullptr);
     EXPECT_STREQ(SensorFactory::get_assoc_targetClass_Name(
-                     broker(), path(System).handle(), SystemDevice, nullptr, none),
-        Sensor);
+                     broker(), path(computerSystem).handle(), systemDevice, nullptr, none),
+        numericSensor);
 }
 
 TEST_F(AssociationTargetTest, ASourceThatIsNoPathHasNoTarget)
@@ -202,10 +202,10 @@ TEST_F(AssociationTargetTest, ASourceThatIsNoPathHasNoTarget)
     for (const CMPIObjectPath* const source :
         {static_cast<const CMPIObjectPath*>(nullptr), &handleless}) {
         EXPECT_EQ(SensorFactory::get_assoc_targetClass_Name(
-                      broker(), source, SystemDevice, nullptr, &rc_),
+                      broker(), source, systemDevice, nullptr, &rc_),
             nullptr);
         EXPECT_EQ(SensorFactory::get_assoc_targetClass_ObjectPath(
-                      broker(), source, SystemDevice, nullptr, &rc_),
+                      broker(), source, systemDevice, nullptr, &rc_),
             nullptr);
     }
     EXPECT_TRUE(messages_.empty());
@@ -217,7 +217,7 @@ TEST_F(AssociationTargetTest, ASourceWhoseClassIsNotToldHasNoTarget)
         FaultyBroker faulty(broker_);
         faulty.plan({BrokerCall::getClassName, 1, manner});
         EXPECT_EQ(SensorFactory::get_assoc_targetClass_Name(faulty.handle(),
-                      faulty.watch(path(Sensor).handle()), SystemDevice, nullptr, &rc_),
+                      faulty.watch(path(numericSensor).handle()), systemDevice, nullptr, &rc_),
             nullptr);
         EXPECT_EQ(rc_.rc, CMPI_RC_ERR_FAILED);
     }
@@ -228,7 +228,7 @@ TEST_F(AssociationTargetTest, ASourceWhoseNamespaceIsNotToldHasNoTargetPath)
     FaultyBroker faulty(broker_);
     faulty.plan({BrokerCall::getNameSpace, 1, FaultManner::nullResult});
     EXPECT_EQ(SensorFactory::get_assoc_targetClass_ObjectPath(faulty.handle(),
-                  faulty.watch(path(Sensor).handle()), SystemDevice, nullptr, &rc_),
+                  faulty.watch(path(numericSensor).handle()), systemDevice, nullptr, &rc_),
         nullptr);
     EXPECT_EQ(rc_.rc, CMPI_RC_ERR_FAILED);
 }
@@ -252,11 +252,11 @@ TEST_F(AssociationTargetTest, NoTargetIsTracedWithItsOwnExitingLineAndAbsentName
 TEST(ClassNamesTest, AreTheOnesOfTheSchema)
 {
     using namespace Vorn::SensorProfileProvider;
-    EXPECT_STREQ(SensorClass, Sensor);
-    EXPECT_STREQ(ComputerSystemClass, System);
-    EXPECT_STREQ(SensorSystemDeviceClass, SystemDevice);
-    EXPECT_STREQ(SensorElementCapabilitiesClass, ElementCapabilities);
-    EXPECT_STREQ(SensorEnabledLogicalElementCapClass, Capabilities);
+    EXPECT_STREQ(SensorClass, numericSensor);
+    EXPECT_STREQ(ComputerSystemClass, computerSystem);
+    EXPECT_STREQ(SensorSystemDeviceClass, systemDevice);
+    EXPECT_STREQ(SensorElementCapabilitiesClass, elementCapabilities);
+    EXPECT_STREQ(SensorEnabledLogicalElementCapClass, capabilities);
 }
 
 } // namespace AssociationTargetTests

@@ -15,8 +15,8 @@ using namespace Testing;
 using namespace ::testing;
 
 constexpr const char* Class = "ZUMLO_SensorEnabledLogicalElementCapabilities";
-constexpr const char* Provider = "SensorEnabledLogicalElementCapabilitiesProvider";
-constexpr const char* Identifier = "ZUMLO:SensorEnabledLogicalElementCap1";
+constexpr const char* provider = "SensorEnabledLogicalElementCapabilitiesProvider";
+constexpr const char* firstIdentifier = "ZUMLO:SensorEnabledLogicalElementCap1";
 
 class CapabilitiesEnumerationTest : public ProviderTest {
 protected:
@@ -71,7 +71,7 @@ TEST_F(CapabilitiesEnumerationTest, TheStatesDoNotGrowFromRequestToRequest)
 {
     getAll();
     getAll();
-    getOne(Identifier);
+    getOne(firstIdentifier);
     getPaths();
     getAll();
     ASSERT_EQ(instances_.size(), 4U);
@@ -118,7 +118,7 @@ TEST_F(NoCapabilitiesTest, HaveNoInstancesAndThatIsNoFailure)
 
 TEST_F(CapabilitiesEnumerationTest, OneInstanceIsFoundByItsWholeIdentifier)
 {
-    EXPECT_EQ(getOne(Identifier), 0);
+    EXPECT_EQ(getOne(firstIdentifier), 0);
     ASSERT_EQ(instances_.size(), 1U);
     EXPECT_EQ(Host::Instance::of(instances_[0])->properties().size(), 3U);
 }
@@ -126,13 +126,13 @@ TEST_F(CapabilitiesEnumerationTest, OneInstanceIsFoundByItsWholeIdentifier)
 TEST_F(CapabilitiesEnumerationTest, OneInstanceHasTheListedProperties)
 {
     const char* properties[] = {"RequestedStatesSupported", nullptr};
-    EXPECT_EQ(getOne(Identifier, properties), 0);
+    EXPECT_EQ(getOne(firstIdentifier, properties), 0);
     EXPECT_EQ(Host::Instance::of(instances_.at(0))->properties().size(), 2U);
 }
 
 TEST_F(CapabilitiesEnumerationTest, AnIdentifierIsNeitherFoldedNorTrimmed)
 {
-    const std::string identifier = Identifier;
+    const std::string identifier = firstIdentifier;
     for (const std::string& other : {std::string("zumlo:sensorenabledlogicalelementcap1"),
              std::string("ZUMLO:SensorEnabledLogicalElementCAP1"), identifier + " ",
              " " + identifier, identifier + "1", identifier.substr(0, identifier.size() - 1),
@@ -155,7 +155,7 @@ TEST_F(CapabilitiesEnumerationTest, AnUnknownIdentifierLeavesTheStatusAsItWas)
 
 TEST_F(NoCapabilitiesTest, AreNotFoundByTheirIdentifier)
 {
-    EXPECT_EQ(getOne(Identifier), 1);
+    EXPECT_EQ(getOne(firstIdentifier), 1);
     EXPECT_TRUE(instances_.empty());
 }
 
@@ -181,7 +181,7 @@ TEST_F(NoCapabilitiesTest, HaveNoObjectPathsAndSayThatToTheBroker)
     EXPECT_EQ(getPaths(), 1);
     EXPECT_TRUE(paths_.empty());
     EXPECT_EQ(rc_.rc, CMPI_RC_ERR_ACCESS_DENIED);
-    EXPECT_THAT(messages_, ElementsAre(BrokerMessage{2, Provider, "***No instance found***"}));
+    EXPECT_THAT(messages_, ElementsAre(BrokerMessage{2, provider, "***No instance found***"}));
 }
 
 TEST_F(CapabilitiesEnumerationTest, AnObjectPathThatCannotBeMadeEndsTheEnumeration)
@@ -196,7 +196,7 @@ TEST_F(CapabilitiesEnumerationTest, AnObjectPathThatCannotBeMadeEndsTheEnumerati
         EXPECT_TRUE(paths_.empty());
         EXPECT_EQ(rc_.rc, CMPI_RC_ERR_FAILED);
         EXPECT_EQ(Testing::textOf(rc_.msg), "Create CMPIObjectPath failed");
-        EXPECT_THAT(messages_, ElementsAre(BrokerMessage{2, Provider,
+        EXPECT_THAT(messages_, ElementsAre(BrokerMessage{2, provider,
                                    "Create CMPIObjectPath failed for" + std::string(21, ' ') +
                                        "SensorEnabledLogicalElementCapabilities class"}));
     }

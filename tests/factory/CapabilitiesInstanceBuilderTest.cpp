@@ -15,8 +15,8 @@ using namespace Testing;
 using namespace ::testing;
 
 constexpr const char* Class = "ZUMLO_SensorEnabledLogicalElementCapabilities";
-constexpr const char* Provider = "SensorEnabledLogicalElementCapabilitiesProvider";
-const std::string WideGap(25, ' ');
+constexpr const char* provider = "SensorEnabledLogicalElementCapabilitiesProvider";
+const std::string wideColumnGap(25, ' ');
 
 class CapabilitiesInstanceBuilderTest : public ProviderTest {
 protected:
@@ -195,10 +195,10 @@ TEST_F(CapabilitiesInstanceBuilderTest, AnArrayThatCannotBeMadeIsReportedAndLeft
             ElementsAre("InstanceID", "ElementNameEditSupported"));
         EXPECT_EQ(rc_.rc, CMPI_RC_ERR_FAILED);
         EXPECT_EQ(Testing::textOf(rc_.msg),
-            "Creating array for Property" + WideGap + "RequestedStatesSupported failed.");
-        EXPECT_THAT(messages_,
-            ElementsAre(BrokerMessage{2, Provider,
-                "Creating Array for Property" + WideGap + "RequestedStatesSupported failed."}));
+            "Creating array for Property" + wideColumnGap + "RequestedStatesSupported failed.");
+        EXPECT_THAT(messages_, ElementsAre(BrokerMessage{2, provider,
+                                   "Creating Array for Property" + wideColumnGap +
+                                       "RequestedStatesSupported failed."}));
         EXPECT_EQ(capture.log().size(), 2U); // entering and exiting
     }
 }

@@ -16,13 +16,13 @@ using Vorn::NodeReading;
 using Vorn::NodeLexicon::NodeType;
 
 // The sensors in the order of the harvest: Z, X, Y.
-const std::vector<ScriptedNode> Unsorted = {{NodeType::Temperature, "/p", "Z", NodeReading{}},
+const std::vector<ScriptedNode> unsorted = {{NodeType::Temperature, "/p", "Z", NodeReading{}},
     {NodeType::Voltage, "/p", "X", NodeReading{}},
     {NodeType::Tachometer, "/p", "Y", NodeReading{}}};
 
 class SensorEnumerationTest : public ProviderTest {
 protected:
-    explicit SensorEnumerationTest(std::vector<ScriptedNode> nodes = Unsorted)
+    explicit SensorEnumerationTest(std::vector<ScriptedNode> nodes = unsorted)
         : machine_(std::move(nodes)), factory_(true, false)
     {
     }

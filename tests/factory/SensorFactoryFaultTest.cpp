@@ -53,7 +53,7 @@ INSTANTIATE_TEST_SUITE_P(NullOrHandleless, UndeliveredTest,
 
 // ---- Paths ----
 
-const BrokerMessage PathFailed = {2, "SensorProfileProvider",
+const BrokerMessage pathFailed = {2, "SensorProfileProvider",
     "Create CMPIObjectPath                     failed for RecordLogClass."};
 
 TEST_P(UndeliveredTest, APathThatCannotBeMadeIsAFailureOfTheBroker)
@@ -63,7 +63,7 @@ TEST_P(UndeliveredTest, APathThatCannotBeMadeIsAFailureOfTheBroker)
     EXPECT_THAT(paths_, IsEmpty());
     EXPECT_EQ(rc_.rc, CMPI_RC_ERR_FAILED);
     EXPECT_EQ(textOf(rc_.msg), "Create CMPIObjectPath failed.");
-    EXPECT_THAT(messages_, ElementsAre(PathFailed));
+    EXPECT_THAT(messages_, ElementsAre(pathFailed));
 }
 
 TEST_P(UndeliveredTest, ThePathsBeforeTheOneThatCannotBeMadeStay)
@@ -79,7 +79,7 @@ TEST_P(UndeliveredTest, AFailureOfPathsNeedsNoStatus)
     faulty_.plan({BrokerCall::newObjectPath, 1, GetParam()});
     EXPECT_EQ(makePaths(nullptr), 2);
     EXPECT_EQ(faulty_.count(BrokerCall::newString), 0U);
-    EXPECT_THAT(messages_, ElementsAre(PathFailed));
+    EXPECT_THAT(messages_, ElementsAre(pathFailed));
 }
 
 TEST_P(UndeliveredTest, AFailureOfPathsHasItsExitingLine)

@@ -18,7 +18,7 @@ using namespace ::testing;
 using Vorn::NodeReading;
 using Vorn::NodeLexicon::NodeType;
 
-const std::vector<ScriptedNode> TwoSensors = {{NodeType::Temperature, "/t", "t", NodeReading{}},
+const std::vector<ScriptedNode> twoSensors = {{NodeType::Temperature, "/t", "t", NodeReading{}},
     {NodeType::Tachometer, "/f", "f", NodeReading{}}};
 
 std::vector<std::string> factoryLines(const LogCapture& capture)
@@ -36,14 +36,14 @@ std::vector<std::string> factoryLines(const LogCapture& capture)
 
 TEST(SensorFactoryTest, WithoutFlagsHarvestsNothing)
 {
-    const ScriptedMachine machine(TwoSensors);
+    const ScriptedMachine machine(twoSensors);
     EXPECT_EQ(SensorFactory().getNumberOfInstances(), 0);
     EXPECT_EQ(SensorFactory(false, false).getNumberOfInstances(), 0);
 }
 
 TEST(SensorFactoryTest, CountsSensorsAndNotCapabilities)
 {
-    const ScriptedMachine machine(TwoSensors);
+    const ScriptedMachine machine(twoSensors);
     EXPECT_EQ(SensorFactory(true, false).getNumberOfInstances(), 2);
     EXPECT_EQ(SensorFactory(true, true).getNumberOfInstances(), 2);
     EXPECT_EQ(SensorFactory(false, true).getNumberOfInstances(), 0);
@@ -87,7 +87,7 @@ TEST(SensorFactoryTraceTest, TheDefaultConstructorAndTheDestructorWriteNothing)
 
 TEST(SensorFactoryTraceTest, TheRequestConstructorTracesItsFlagsAndItsMaps)
 {
-    const ScriptedMachine machine(TwoSensors);
+    const ScriptedMachine machine(twoSensors);
     const LogCapture capture;
     SensorFactory factory(true, true);
     EXPECT_THAT(factoryLines(capture),
@@ -137,7 +137,7 @@ TEST(SensorFactoryTraceTest, CountingIsMarkedWithoutParameters)
 
 TEST(SensorFactoryTraceTest, SensorsAreHarvestedBeforeCapabilities)
 {
-    const ScriptedMachine machine(TwoSensors);
+    const ScriptedMachine machine(twoSensors);
     const LogCapture capture;
     SensorFactory factory(true, true);
     std::vector<std::string> functions;

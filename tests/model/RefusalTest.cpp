@@ -24,7 +24,7 @@ struct Refusal {
 };
 
 // The setters in the order of the harvest.
-const std::vector<Refusal> Refusals = {
+const std::vector<Refusal> refusals = {
     {"setDeviceID", "Failed while setting Device ID"},
     {"setElementName", "Failed while setting Element Name"},
     {"setSensorType", "Failed while setting Sensor Type"},
@@ -71,7 +71,7 @@ TEST_F(RefusalTest, ValuesAreHandedOverInOrder)
     std::vector<Sensor> sensors;
     EXPECT_FALSE(getSensorInstances(sensors));
     std::vector<std::string> expected;
-    for (const Refusal& refusal : Refusals)
+    for (const Refusal& refusal : refusals)
         expected.push_back(refusal.setter);
     EXPECT_EQ(Testing::setterCalls, expected);
 }
@@ -89,7 +89,7 @@ TEST_F(RefusalTest, AStatusOfZeroCallsNoneOfTheFourStatusSetters)
 
 TEST_F(RefusalTest, EachRefusedValueThrowsItsMessage)
 {
-    for (const Refusal& refusal : Refusals) {
+    for (const Refusal& refusal : refusals) {
         const ScriptedMachine machine({fullNode(NodeType::Temperature, "t")});
         Testing::refusedSetter = refusal.setter;
         Vorn::Instrumentation instrumentation;
@@ -109,7 +109,7 @@ TEST_F(RefusalTest, EachRefusedValueThrowsItsMessage)
 
 TEST_F(RefusalTest, ARefusedValueEndsTheWalkOfItsTypeWithTheGenericText)
 {
-    for (const Refusal& refusal : Refusals) {
+    for (const Refusal& refusal : refusals) {
         const ScriptedMachine machine(
             {fullNode(NodeType::Temperature, "t"), fullNode(NodeType::Voltage, "v")});
         Testing::refusedSetter = refusal.setter;

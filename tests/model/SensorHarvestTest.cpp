@@ -21,9 +21,9 @@ using Vorn::Instrumentation;
 using Vorn::NodeReading;
 using Vorn::NodeLexicon::NodeType;
 
-constexpr NodeType Temperature = NodeType::Temperature;
-constexpr NodeType Voltage = NodeType::Voltage;
-constexpr NodeType Tachometer = NodeType::Tachometer;
+constexpr NodeType temperature = NodeType::Temperature;
+constexpr NodeType voltage = NodeType::Voltage;
+constexpr NodeType tachometer = NodeType::Tachometer;
 
 ScriptedNode node(NodeType type, const std::string& name)
 {
@@ -82,7 +82,7 @@ TEST(HarvestTest, ThatFailsOutlivesAStandardErrorThatNobodyReads)
 TEST(NodeLexiconTest, NumbersAreThoseOfTheHardwareModel)
 {
     using Vorn::NodeLexicon::Properties;
-    EXPECT_THAT((std::vector{Tachometer, Voltage, Temperature}),
+    EXPECT_THAT((std::vector{tachometer, voltage, temperature}),
         ElementsAre(NodeType{20}, NodeType{21}, NodeType{22}));
     EXPECT_THAT(
         (std::vector{Properties::Reading, Properties::UpperCritical, Properties::UpperNonCritical,
@@ -94,8 +94,8 @@ TEST(NodeLexiconTest, NumbersAreThoseOfTheHardwareModel)
 
 TEST(HarvestTest, GoesThroughTemperaturesThenVoltagesThenTachometers)
 {
-    const ScriptedMachine machine({node(Tachometer, "fan1"), node(Voltage, "in1"),
-        node(Temperature, "temp1"), node(Tachometer, "fan2"), node(Temperature, "temp2")});
+    const ScriptedMachine machine({node(tachometer, "fan1"), node(voltage, "in1"),
+        node(temperature, "temp1"), node(tachometer, "fan2"), node(temperature, "temp2")});
     const Harvest result = harvest();
     EXPECT_FALSE(result.nothing);
     EXPECT_THAT(names(result.sensors), ElementsAre("temp1", "temp2", "in1", "fan1", "fan2"));
@@ -103,7 +103,7 @@ TEST(HarvestTest, GoesThroughTemperaturesThenVoltagesThenTachometers)
 
 TEST(HarvestTest, OfFansAloneSucceeds)
 {
-    const ScriptedMachine machine({node(Tachometer, "fan1")});
+    const ScriptedMachine machine({node(tachometer, "fan1")});
     const Harvest result = harvest();
     EXPECT_FALSE(result.nothing);
     EXPECT_EQ(result.sensors.size(), 1U);
@@ -111,7 +111,7 @@ TEST(HarvestTest, OfFansAloneSucceeds)
 
 TEST(HarvestTest, AppendsToWhatIsThere)
 {
-    const ScriptedMachine machine({node(Tachometer, "fan1")});
+    const ScriptedMachine machine({node(tachometer, "fan1")});
     std::vector<Sensor> sensors(2);
     EXPECT_FALSE(getSensorInstances(sensors));
     EXPECT_THAT(names(sensors), ElementsAre("", "", "fan1"));
@@ -119,8 +119,8 @@ TEST(HarvestTest, AppendsToWhatIsThere)
 
 TEST(HarvestTest, NamesASensorByItsDescriptionAndPath)
 {
-    const ScriptedMachine machine({{Temperature, "/a/b", "CPU 1 Temp", NodeReading{}},
-        {Temperature, "/a/c", "CPU 1 Temp", NodeReading{}}});
+    const ScriptedMachine machine({{temperature, "/a/b", "CPU 1 Temp", NodeReading{}},
+        {temperature, "/a/c", "CPU 1 Temp", NodeReading{}}});
     Harvest result = harvest();
     ASSERT_EQ(result.sensors.size(), 2U);
     EXPECT_EQ(result.sensors[0].getDeviceID(), "CPU 1 Temp:/a/b");
@@ -130,9 +130,9 @@ TEST(HarvestTest, NamesASensorByItsDescriptionAndPath)
 
 TEST(HarvestTest, TakesTheTypeThatTheNodeReports)
 {
-    ScriptedNode odd = node(Temperature, "odd");
+    ScriptedNode odd = node(temperature, "odd");
     odd.sensorType = 21;
-    ScriptedNode unknown = node(Temperature, "unknown");
+    ScriptedNode unknown = node(temperature, "unknown");
     unknown.sensorType = 99;
     const ScriptedMachine machine({odd, unknown});
     Harvest result = harvest();
@@ -154,7 +154,7 @@ TEST(HarvestTest, FillsEveryFieldOfASensor)
     reading.upperFatal = 7;
     reading.baseUnits = 5;
     reading.possibleStates = {{1, 26}};
-    const ScriptedMachine machine({{Voltage, "/v", "Vcore", reading}});
+    const ScriptedMachine machine({{voltage, "/v", "Vcore", reading}});
     Harvest result = harvest();
     ASSERT_EQ(result.sensors.size(), 1U);
     Sensor& sensor = result.sensors[0];
@@ -179,7 +179,7 @@ TEST(HarvestTest, FillsEveryFieldOfASensor)
 
 TEST(HarvestTest, OfANodeWithoutStatusOrPropertiesLeavesTheDefaults)
 {
-    const ScriptedMachine machine({node(Temperature, "bare")});
+    const ScriptedMachine machine({node(temperature, "bare")});
     Harvest result = harvest();
     ASSERT_EQ(result.sensors.size(), 1U);
     Sensor& sensor = result.sensors[0];
@@ -202,7 +202,7 @@ TEST(HarvestTest, DoesNotCarryValuesFromOneNodeToTheNext)
     reading.upperCritical = 90;
     reading.possibleStates = {{1}};
     const ScriptedMachine machine(
-        {{Temperature, "/a", "a", reading}, {Temperature, "/b", "b", NodeReading{}}});
+        {{temperature, "/a", "a", reading}, {temperature, "/b", "b", NodeReading{}}});
     Harvest result = harvest();
     ASSERT_EQ(result.sensors.size(), 2U);
     EXPECT_EQ(result.sensors[1].getCurrentReading(), 0);
@@ -213,25 +213,25 @@ TEST(HarvestTest, DoesNotCarryValuesFromOneNodeToTheNext)
 // ---- Failures ----
 
 // The text of the base class; the exception's own text is never printed.
-const std::string Generic = "std::exception\n";
+const std::string generic = "std::exception\n";
 
 TEST(HarvestFailureTest, AtConstructionIsReportedOncePerTypeWithTheGenericText)
 {
-    ScriptedMachine machine({node(Temperature, "t")});
+    ScriptedMachine machine({node(temperature, "t")});
     machine.failConstruction();
     const Harvest result = harvest();
     EXPECT_TRUE(result.nothing);
     EXPECT_TRUE(result.sensors.empty());
-    EXPECT_EQ(result.standardError, Generic + Generic + Generic);
+    EXPECT_EQ(result.standardError, generic + generic + generic);
 }
 
 class HarvestFailureOfTypeTest : public ::testing::TestWithParam<NodeType> {
 protected:
     std::vector<ScriptedNode> nodes() const
     {
-        return {node(Temperature, "t1"), node(Temperature, "t2"), node(Temperature, "t3"),
-            node(Voltage, "v1"), node(Voltage, "v2"), node(Voltage, "v3"), node(Tachometer, "f1"),
-            node(Tachometer, "f2"), node(Tachometer, "f3")};
+        return {node(temperature, "t1"), node(temperature, "t2"), node(temperature, "t3"),
+            node(voltage, "v1"), node(voltage, "v2"), node(voltage, "v3"), node(tachometer, "f1"),
+            node(tachometer, "f2"), node(tachometer, "f3")};
     }
 
     // Returns the names that are harvested when the iteration of the type ends before the given
@@ -254,7 +254,7 @@ TEST_P(HarvestFailureOfTypeTest, AtSelectionLeavesTheOtherTypes)
     const Harvest result = harvest();
     EXPECT_FALSE(result.nothing);
     EXPECT_EQ(names(result.sensors), namesWhenTypeEndsAt(0));
-    EXPECT_EQ(result.standardError, Generic);
+    EXPECT_EQ(result.standardError, generic);
 }
 
 TEST_P(HarvestFailureOfTypeTest, AtAPropertyKeepsTheNodesBeforeIt)
@@ -266,7 +266,7 @@ TEST_P(HarvestFailureOfTypeTest, AtAPropertyKeepsTheNodesBeforeIt)
     const Harvest result = harvest();
     EXPECT_FALSE(result.nothing);
     EXPECT_EQ(names(result.sensors), namesWhenTypeEndsAt(1));
-    EXPECT_EQ(result.standardError, Generic);
+    EXPECT_EQ(result.standardError, generic);
 }
 
 TEST_P(HarvestFailureOfTypeTest, ByARefusedNameKeepsTheNodesBeforeIt)
@@ -279,7 +279,7 @@ TEST_P(HarvestFailureOfTypeTest, ByARefusedNameKeepsTheNodesBeforeIt)
     const Harvest result = harvest();
     EXPECT_FALSE(result.nothing);
     EXPECT_EQ(names(result.sensors), namesWhenTypeEndsAt(2));
-    EXPECT_EQ(result.standardError, Generic);
+    EXPECT_EQ(result.standardError, generic);
 }
 
 TEST_P(HarvestFailureOfTypeTest, AloneIsAHarvestOfNothing)
@@ -293,14 +293,14 @@ TEST_P(HarvestFailureOfTypeTest, AloneIsAHarvestOfNothing)
 }
 
 INSTANTIATE_TEST_SUITE_P(EveryType, HarvestFailureOfTypeTest,
-    ::testing::Values(Temperature, Voltage, Tachometer),
+    ::testing::Values(temperature, voltage, tachometer),
     [](const auto& test) { return std::to_string(static_cast<unsigned>(test.param)); });
 
 TEST(HarvestFailureTest, KeepsRecordsThoughNoTypeSucceeds)
 {
-    ScriptedNode broken = node(Temperature, "broken");
+    ScriptedNode broken = node(temperature, "broken");
     broken.failsWhenRead = true;
-    const ScriptedMachine machine({node(Temperature, "t1"), broken});
+    const ScriptedMachine machine({node(temperature, "t1"), broken});
     const Harvest result = harvest();
     EXPECT_TRUE(result.nothing);
     EXPECT_THAT(names(result.sensors), ElementsAre("t1"));
@@ -308,9 +308,9 @@ TEST(HarvestFailureTest, KeepsRecordsThoughNoTypeSucceeds)
 
 TEST(SetVectorTest, ThrowsTheRefusalAndStaysOnTheNode)
 {
-    const ScriptedMachine machine({{Temperature, "/a", "", NodeReading{}}});
+    const ScriptedMachine machine({{temperature, "/a", "", NodeReading{}}});
     Instrumentation instrumentation;
-    instrumentation.selectNode(Temperature);
+    instrumentation.selectNode(temperature);
     std::vector<Sensor> sensors;
     try {
         setVector(sensors, instrumentation);
@@ -325,9 +325,9 @@ TEST(SetVectorTest, ThrowsTheRefusalAndStaysOnTheNode)
 
 TEST(SetVectorTest, BeginsAtTheNodeUnderTheCursor)
 {
-    const ScriptedMachine machine({node(Temperature, "t1"), node(Temperature, "t2")});
+    const ScriptedMachine machine({node(temperature, "t1"), node(temperature, "t2")});
     Instrumentation instrumentation;
-    instrumentation.selectNode(Temperature);
+    instrumentation.selectNode(temperature);
     ++instrumentation;
     std::vector<Sensor> sensors;
     EXPECT_FALSE(setVector(sensors, instrumentation));

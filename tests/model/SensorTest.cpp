@@ -14,7 +14,7 @@ using Codes = std::vector<std::uint16_t>;
 using Labels = std::vector<std::string>;
 
 // All codes near the entries of the tables, and some far from them.
-const std::vector<unsigned> AllCodes = [] {
+const std::vector<unsigned> allCodes = [] {
     std::vector<unsigned> codes;
     for (unsigned code = 0; code <= 40; ++code)
         codes.push_back(code);
@@ -113,7 +113,7 @@ TEST(SensorTest, EachSensorTypeCodeGivesItsTypeScaleAndModifier)
         int modifier;
     };
     const std::map<unsigned, Row> rows = {{20, {5, 2, 0}}, {21, {3, 2500, -3}}, {22, {2, 2, 0}}};
-    for (const unsigned code : AllCodes) {
+    for (const unsigned code : allCodes) {
         const bool known = rows.contains(code);
         const Row row = known ? rows.at(code) : Row{0, 2, 0};
         Sensor sensor;
@@ -131,7 +131,7 @@ TEST(SensorTest, EachSensorTypeCodeGivesItsTypeScaleAndModifier)
 TEST(SensorTest, EachNodeStatusGivesItsEnabledState)
 {
     const std::map<unsigned, int> rows = {{0, 0}, {1, 2}, {12, 6}, {16, 3}};
-    for (const unsigned code : AllCodes) {
+    for (const unsigned code : allCodes) {
         Sensor sensor;
         EXPECT_TRUE(sensor.setEnabledState(code));
         EXPECT_EQ(sensor.getEnabledState(), expected(rows, code, 5)) << code;
@@ -142,7 +142,7 @@ TEST(SensorTest, EachCodeGivesItsRequestedState)
 {
     const std::map<unsigned, int> rows = {
         {0, 0}, {1, 2}, {3, 4}, {8, 9}, {9, 10}, {12, 4}, {16, 3}};
-    for (const unsigned code : AllCodes) {
+    for (const unsigned code : allCodes) {
         Sensor sensor;
         EXPECT_TRUE(sensor.setRequestedState(code));
         EXPECT_EQ(sensor.getRequestedState(), expected(rows, code, 12)) << code;
@@ -155,7 +155,7 @@ TEST(SensorTest, EachNodeStatusGivesItsHealthStateAndStatus)
     const std::map<unsigned, Health> rows = {{0, {0, "UnKnown"}}, {20, {10, "Error"}},
         {21, {10, "Error"}}, {22, {10, "Error"}}, {23, {10, "Error"}}, {24, {25, "Error"}},
         {25, {25, "Error"}}, {26, {25, "Error"}}};
-    for (const unsigned code : AllCodes) {
+    for (const unsigned code : allCodes) {
         Sensor sensor;
         EXPECT_TRUE(sensor.setHealthState(code));
         const Health health = {sensor.getHealthState(), sensor.getHealthStatus()};
@@ -163,16 +163,16 @@ TEST(SensorTest, EachNodeStatusGivesItsHealthStateAndStatus)
     }
 }
 
-const std::map<unsigned, std::string> StateLabelRows = {{1, "Normal"}, {12, "Offline"},
+const std::map<unsigned, std::string> stateLabelRows = {{1, "Normal"}, {12, "Offline"},
     {16, "Disabled"}, {21, "Warning"}, {22, "WarningLow"}, {23, "WarningHigh"}, {24, "Critical"},
     {25, "CriticalLow"}, {26, "CriticalHigh"}};
 
 TEST(SensorTest, EachNodeStatusGivesItsCurrentState)
 {
-    for (const unsigned code : AllCodes) {
+    for (const unsigned code : allCodes) {
         Sensor sensor;
         EXPECT_TRUE(sensor.setCurrentState(code));
-        EXPECT_EQ(sensor.getCurrentState(), expected<std::string>(StateLabelRows, code, "Unknown"))
+        EXPECT_EQ(sensor.getCurrentState(), expected<std::string>(stateLabelRows, code, "Unknown"))
             << code;
     }
 }
@@ -181,7 +181,7 @@ TEST(SensorTest, EachNodeStatusGivesItsOperationalStatus)
 {
     const std::map<unsigned, int> rows = {
         {0, 0}, {1, 2}, {2, 8}, {3, 9}, {8, 15}, {10, 10}, {13, 13}, {17, 12}, {20, 5}};
-    for (const unsigned code : AllCodes) {
+    for (const unsigned code : allCodes) {
         Sensor sensor;
         EXPECT_TRUE(sensor.setOperationalStatus(code));
         EXPECT_EQ(sensor.getOperationalStatus(),
@@ -199,13 +199,13 @@ TEST(SensorTest, OperationalStatusGrowsWithEverySetting)
     EXPECT_EQ(sensor.getOperationalStatus(), (Codes{2, 2, 5}));
 }
 
-const Labels FixedLabels = {"Normal", "Warning", "Non-Critical", "Lower Non-Critical",
+const Labels fixedLabels = {"Normal", "Warning", "Non-Critical", "Lower Non-Critical",
     "Upper Non-Critical", "Critical", "Lower Critical", "Upper Critical", "Fatal", "Lower Fatal",
     "Upper Fatal", "Unknown"};
 
 Labels withFixedLabels(Labels labels)
 {
-    labels.insert(labels.end(), FixedLabels.begin(), FixedLabels.end());
+    labels.insert(labels.end(), fixedLabels.begin(), fixedLabels.end());
     return labels;
 }
 
@@ -220,22 +220,22 @@ TEST(SensorTest, PossibleStatesAreTheirLabelsAndThenTheFixedOnes)
 TEST(SensorTest, EachPossibleStateHasTheLabelOfTheCurrentState)
 {
     Sensor sensor;
-    sensor.setPossibleStates(AllCodes);
+    sensor.setPossibleStates(allCodes);
     Labels labels;
-    for (const unsigned code : AllCodes)
-        labels.push_back(expected<std::string>(StateLabelRows, code, "Unknown"));
+    for (const unsigned code : allCodes)
+        labels.push_back(expected<std::string>(stateLabelRows, code, "Unknown"));
     EXPECT_EQ(sensor.getPossibleStates(), withFixedLabels(labels));
 }
 
 TEST(SensorTest, PossibleStatesGrowWithEveryReadingAndAreReplacedBySetting)
 {
     Sensor sensor;
-    EXPECT_EQ(sensor.getPossibleStates(), FixedLabels);
-    EXPECT_EQ(sensor.getPossibleStates(), withFixedLabels(FixedLabels));
+    EXPECT_EQ(sensor.getPossibleStates(), fixedLabels);
+    EXPECT_EQ(sensor.getPossibleStates(), withFixedLabels(fixedLabels));
     EXPECT_TRUE(sensor.setPossibleStates({1, 1}));
     EXPECT_EQ(sensor.getPossibleStates(), withFixedLabels({"Normal", "Normal"}));
     EXPECT_TRUE(sensor.setPossibleStates({}));
-    EXPECT_EQ(sensor.getPossibleStates(), FixedLabels);
+    EXPECT_EQ(sensor.getPossibleStates(), fixedLabels);
 }
 
 TEST(SensorTest, ThresholdListsGrowWithEveryReadingEachOnItsOwn)
@@ -266,11 +266,11 @@ struct Scaling {
     std::int32_t stored;
 };
 
-constexpr double Infinity = std::numeric_limits<double>::infinity();
-constexpr double NotANumber = std::numeric_limits<double>::quiet_NaN();
-constexpr std::int32_t OutOfRange = std::numeric_limits<std::int32_t>::min();
+constexpr double infinity = std::numeric_limits<double>::infinity();
+constexpr double notANumber = std::numeric_limits<double>::quiet_NaN();
+constexpr std::int32_t outOfRange = std::numeric_limits<std::int32_t>::min();
 
-const std::vector<Scaling> Scalings = {
+const std::vector<Scaling> scalings = {
     {21, 12.3456, 12345},
     {22, -0.5, 0},
     {22, 2.9, 2},
@@ -286,16 +286,16 @@ const std::vector<Scaling> Scalings = {
     // The limits of the range.
     {22, 2147483647.0, 2147483647},
     {22, 2147483647.9, 2147483647},
-    {22, 2147483648.0, OutOfRange},
-    {22, -2147483648.0, OutOfRange},
-    {22, -2147483649.0, OutOfRange},
-    {22, 3.0e9, OutOfRange},
-    {21, 3.0e6, OutOfRange},
+    {22, 2147483648.0, outOfRange},
+    {22, -2147483648.0, outOfRange},
+    {22, -2147483649.0, outOfRange},
+    {22, 3.0e9, outOfRange},
+    {21, 3.0e6, outOfRange},
     {21, 2147483.0, 2147483000},
-    {22, Infinity, OutOfRange},
-    {22, -Infinity, OutOfRange},
-    {21, NotANumber, OutOfRange},
-    {21, 1e308, OutOfRange},
+    {22, infinity, outOfRange},
+    {22, -infinity, outOfRange},
+    {21, notANumber, outOfRange},
+    {21, 1e308, outOfRange},
 };
 
 struct ScaledField {
@@ -304,7 +304,7 @@ struct ScaledField {
     std::int32_t (Sensor::*get)() const;
 };
 
-const std::vector<ScaledField> ScaledFields = {
+const std::vector<ScaledField> scaledFields = {
     {"CurrentReading", &Sensor::setCurrentReading, &Sensor::getCurrentReading},
     {"LowerThresholdNonCritical", &Sensor::setLowerThresholdNonCritical,
         &Sensor::getLowerThresholdNonCritical},
@@ -320,8 +320,8 @@ const std::vector<ScaledField> ScaledFields = {
 
 TEST(SensorTest, EveryScaledFieldIsMultipliedInExtendedPrecisionAndCut)
 {
-    for (const ScaledField& field : ScaledFields)
-        for (const Scaling& scaling : Scalings) {
+    for (const ScaledField& field : scaledFields)
+        for (const Scaling& scaling : scalings) {
             Sensor sensor;
             sensor.setSensorType(scaling.sensorType);
             EXPECT_TRUE((sensor.*field.set)(scaling.value));
@@ -334,10 +334,10 @@ TEST(SensorTest, EveryScaledFieldIsStoredApartFromTheOthers)
 {
     Sensor sensor;
     double value = 1.0;
-    for (const ScaledField& field : ScaledFields)
+    for (const ScaledField& field : scaledFields)
         (sensor.*field.set)(value++);
     std::int32_t stored = 1;
-    for (const ScaledField& field : ScaledFields)
+    for (const ScaledField& field : scaledFields)
         EXPECT_EQ((sensor.*field.get)(), stored++) << field.name;
 }
 

@@ -20,7 +20,7 @@ struct Journey {
     const char* otherClass;
 };
 
-const Journey Journeys[] = {
+const Journey journeys[] = {
     {"elementCapabilities", "ZUMLO_SensorElementCapabilities",
         SensorElementCapabilitiesProvider_Create_InstanceMI,
         SensorElementCapabilitiesProvider_Create_AssociationMI, CapabilitiesClass},
@@ -33,7 +33,7 @@ class AssociationRoundTripTest : public AssociationTest,
 protected:
     AssociationRoundTripTest()
         : AssociationTest(
-              GetParam().instances, GetParam().associations, ThreeSensors, {"host", "guest"})
+              GetParam().instances, GetParam().associations, threeSensors, {"host", "guest"})
     {
     }
 
@@ -88,7 +88,7 @@ private:
     }
 };
 
-INSTANTIATE_TEST_SUITE_P(Each, AssociationRoundTripTest, ::testing::ValuesIn(Journeys),
+INSTANTIATE_TEST_SUITE_P(Each, AssociationRoundTripTest, ::testing::ValuesIn(journeys),
     [](const ::testing::TestParamInfo<Journey>& journey) { return journey.param.name; });
 
 TEST_P(AssociationRoundTripTest, FromNamesAndInstancesToInstances)

@@ -15,7 +15,7 @@
 
 namespace Testing {
 
-constexpr const char* CapabilitiesID = "ZUMLO:SensorEnabledLogicalElementCap1";
+constexpr const char* capabilitiesId = "ZUMLO:SensorEnabledLogicalElementCap1";
 
 // The optional parameters of a request for associated objects.
 struct Filter {
@@ -56,7 +56,7 @@ private:
 };
 
 // The sensors in the order of the harvest: C, B, A.
-inline const std::vector<ScriptedNode> ThreeSensors = {
+inline const std::vector<ScriptedNode> threeSensors = {
     {Vorn::NodeLexicon::NodeType::Temperature, "/3", "C", Vorn::NodeReading{}},
     {Vorn::NodeLexicon::NodeType::Voltage, "/2", "B", Vorn::NodeReading{}},
     {Vorn::NodeLexicon::NodeType::Tachometer, "/1", "A", Vorn::NodeReading{}}};
@@ -75,7 +75,7 @@ protected:
 
     // ---- Ends ----
 
-    Host::ObjectPath& sensor(const std::string& deviceID, const char* nameSpace = NameSpace)
+    Host::ObjectPath& sensor(const std::string& deviceID, const char* nameSpace = testNameSpace)
     {
         Host::ObjectPath& made = path(SensorClass,
             {{"CreationClassName", SensorClass}, {"DeviceID", deviceID},
@@ -85,15 +85,15 @@ protected:
         return made;
     }
 
-    Host::ObjectPath& capabilities(const char* nameSpace = NameSpace)
+    Host::ObjectPath& capabilities(const char* nameSpace = testNameSpace)
     {
         Host::ObjectPath& made =
-            path(CapabilitiesClass, {{"InstanceID", CapabilitiesID}}, nameSpace);
+            path(CapabilitiesClass, {{"InstanceID", capabilitiesId}}, nameSpace);
         made.setHost(systemName_.c_str());
         return made;
     }
 
-    Host::ObjectPath& system(const std::string& name, const char* nameSpace = NameSpace)
+    Host::ObjectPath& system(const std::string& name, const char* nameSpace = testNameSpace)
     {
         return path(SystemClass, {{"CreationClassName", SystemClass}, {"Name", name}}, nameSpace);
     }

@@ -11,10 +11,10 @@ namespace BrokerValuesTests {
 using namespace Vorn::SensorProfileProvider;
 using Testing::ProviderTest;
 
-constexpr CMPIValueState Unusable[] = {CMPI_nullValue, CMPI_notFound, CMPI_badValue,
+constexpr CMPIValueState unusable[] = {CMPI_nullValue, CMPI_notFound, CMPI_badValue,
     CMPI_nullValue | CMPI_notFound, CMPI_keyValue | CMPI_nullValue};
-constexpr CMPIValueState Usable[] = {CMPI_goodValue, CMPI_keyValue};
-constexpr CMPIType NoText[] = {CMPI_null, CMPI_chars, CMPI_uint64, CMPI_sint64, CMPI_boolean,
+constexpr CMPIValueState usable[] = {CMPI_goodValue, CMPI_keyValue};
+constexpr CMPIType noText[] = {CMPI_null, CMPI_chars, CMPI_uint64, CMPI_sint64, CMPI_boolean,
     CMPI_ref, CMPI_instance, CMPI_stringA};
 
 class BrokerValuesTest : public ProviderTest {
@@ -48,15 +48,15 @@ protected:
 
 TEST_F(BrokerValuesTest, ATextKeyIsItsString)
 {
-    for (const CMPIValueState state : Usable)
+    for (const CMPIValueState state : usable)
         EXPECT_EQ(readAsText(dataOf(CMPI_string, state, text_), &status_), text_);
 }
 
 TEST_F(BrokerValuesTest, ATextKeyOfAnotherTypeOrStateIsAbsentAndNoFailure)
 {
-    for (const CMPIValueState state : Unusable)
+    for (const CMPIValueState state : unusable)
         EXPECT_EQ(readAsText(dataOf(CMPI_string, state, text_), &status_), nullptr) << state;
-    for (const CMPIType type : NoText)
+    for (const CMPIType type : noText)
         EXPECT_EQ(readAsText(dataOf(type, 0, text_), &status_), nullptr) << type;
     CMPIString handleless = {nullptr, text_->ft};
     EXPECT_EQ(readAsText(dataOf(CMPI_string, 0, &handleless), &status_), nullptr);
@@ -71,7 +71,7 @@ TEST_F(BrokerValuesTest, APathIsAPathWithAHandleWhateverItsState)
     data.value.ref = path.handle();
     EXPECT_EQ(pathOf(data), path.handle());
     EXPECT_EQ(instanceOf(data), nullptr);
-    for (const CMPIValueState state : Unusable) {
+    for (const CMPIValueState state : unusable) {
         data.state = state;
         EXPECT_EQ(pathOf(data), path.handle());
     }
@@ -88,7 +88,7 @@ TEST_F(BrokerValuesTest, AnInstanceIsAnInstanceWithAHandleWhateverItsState)
     data.value.inst = instance.handle();
     EXPECT_EQ(instanceOf(data), instance.handle());
     EXPECT_EQ(pathOf(data), nullptr);
-    for (const CMPIValueState state : Unusable) {
+    for (const CMPIValueState state : unusable) {
         data.state = state;
         EXPECT_EQ(instanceOf(data), instance.handle());
     }

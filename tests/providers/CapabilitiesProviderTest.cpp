@@ -15,9 +15,9 @@ using Vorn::NodeReading;
 using Vorn::NodeLexicon::NodeType;
 
 constexpr const char* Class = "ZUMLO_SensorEnabledLogicalElementCapabilities";
-constexpr const char* Provider = "SensorEnabledLogicalElementCapabilitiesProvider";
-constexpr const char* Identifier = "ZUMLO:SensorEnabledLogicalElementCap1";
-constexpr const char* NoKeyText = "At least one key should be passed";
+constexpr const char* provider = "SensorEnabledLogicalElementCapabilitiesProvider";
+constexpr const char* firstIdentifier = "ZUMLO:SensorEnabledLogicalElementCap1";
+constexpr const char* noKeyText = "At least one key should be passed";
 
 class CapabilitiesProviderTest : public InstanceRequestsTest {
 protected:
@@ -106,7 +106,7 @@ TEST_F(CapabilitiesProviderTest, AnInstanceIsFoundByItsIdentifier)
         Host::CollectedResult found;
         Host::Result into(found);
         expectOk(mi_->ft->getInstance(mi_, context(), into.handle(),
-            path(Class, {{"InstanceID", Identifier}}).handle(), list));
+            path(Class, {{"InstanceID", firstIdentifier}}).handle(), list));
         ASSERT_EQ(found.instances().size(), 1U);
         EXPECT_EQ(found.instances()[0]->properties().size(), list ? 2U : 3U);
         EXPECT_TRUE(found.isDone());

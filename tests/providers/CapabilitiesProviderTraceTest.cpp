@@ -14,7 +14,7 @@ using ::testing::ElementsAreArray;
 using namespace Testing;
 
 constexpr const char* Class = "ZUMLO_SensorEnabledLogicalElementCapabilities";
-constexpr const char* Identifier = "ZUMLO:SensorEnabledLogicalElementCap1";
+constexpr const char* firstIdentifier = "ZUMLO:SensorEnabledLogicalElementCap1";
 
 HandlerLines handler(const std::string& request)
 {
@@ -22,11 +22,12 @@ HandlerLines handler(const std::string& request)
     return {module, module, "SensorEnabledLogicalElementCapabilities_" + request};
 }
 
-const Lines Built = builtFactory({"_createEnabledLogicalElementCapMap"});
-const Lines Instance = operation("makeSensorEnabledLogicalElementCapInstance", 863, 965);
-const Lines Instances = operation("getAllSensorEnabledLogicalElementCapCMPIInstances", 996, 1017);
-const std::string OneInstance = "getOneSensorEnabledLogicalElementCapCMPIInstance";
-const std::string Paths = "getAllSensorEnabledLogicalElementCapCMPIObjPaths";
+const Lines builtLines = builtFactory({"_createEnabledLogicalElementCapMap"});
+const Lines instanceLines = operation("makeSensorEnabledLogicalElementCapInstance", 863, 965);
+const Lines instanceRequest =
+    operation("getAllSensorEnabledLogicalElementCapCMPIInstances", 996, 1017);
+const std::string oneInstance = "getOneSensorEnabledLogicalElementCapCMPIInstance";
+const std::string pathLines = "getAllSensorEnabledLogicalElementCapCMPIObjPaths";
 
 class CapabilitiesProviderTraceTest : public ProviderTest {
 protected:
@@ -68,8 +69,8 @@ protected:
 TEST_F(CapabilitiesProviderTraceTest, OfEnumeratedNames)
 {
     const HandlerLines lines = handler("EnumInstanceNames");
-    EXPECT_THAT(traceOfNames(), ElementsAreArray(sequence({lines.entry(74), Built,
-                                    operation(Paths, 1041, 1093), lines.exit(114)})));
+    EXPECT_THAT(traceOfNames(), ElementsAreArray(sequence({lines.entry(74), builtLines,
+                                    operation(pathLines, 1041, 1093), lines.exit(114)})));
 }
 
 TEST_F(CapabilitiesProviderTraceTest, OfNamesThatCannotBeMade)
@@ -78,33 +79,33 @@ TEST_F(CapabilitiesProviderTraceTest, OfNamesThatCannotBeMade)
     FaultyBroker faulty(broker_);
     faulty.plan({BrokerCall::newObjectPath, 1, FaultManner::nullResult});
     use(faulty.handle());
-    EXPECT_THAT(
-        traceOfNames(), ElementsAreArray(sequence({lines.entry(74), Built, brokenOff(Paths, 1041),
-                            lines.failure(Paths + " failed", 90), lines.exit(92)})));
+    EXPECT_THAT(traceOfNames(),
+        ElementsAreArray(sequence({lines.entry(74), builtLines, brokenOff(pathLines, 1041),
+            lines.failure(pathLines + " failed", 90), lines.exit(92)})));
     EXPECT_FALSE(answer_.isDone());
 }
 
 TEST_F(CapabilitiesProviderTraceTest, OfEnumeratedInstances)
 {
     const HandlerLines lines = handler("EnumInstances");
-    EXPECT_THAT(traceOfInstances(), ElementsAreArray(sequence({lines.entry(137), Built,
-                                        around(Instances, Instance), lines.exit(169)})));
+    EXPECT_THAT(traceOfInstances(), ElementsAreArray(sequence({lines.entry(137), builtLines,
+                                        around(instanceRequest, instanceLines), lines.exit(169)})));
 }
 
 TEST_F(CapabilitiesProviderTraceTest, OfAnInstanceFound)
 {
     const HandlerLines lines = handler("GetInstance");
-    EXPECT_THAT(traceOfOne({{"InstanceID", Identifier}}),
-        ElementsAreArray(sequence({lines.entry(191), Built,
-            around(operation(OneInstance, 1134, 1158), Instance), lines.exit(283)})));
+    EXPECT_THAT(traceOfOne({{"InstanceID", firstIdentifier}}),
+        ElementsAreArray(sequence({lines.entry(191), builtLines,
+            around(operation(oneInstance, 1134, 1158), instanceLines), lines.exit(283)})));
 }
 
 TEST_F(CapabilitiesProviderTraceTest, OfAnInstanceNotFound)
 {
     const HandlerLines lines = handler("GetInstance");
     EXPECT_THAT(traceOfOne({{"InstanceID", "other"}}),
-        ElementsAreArray(sequence({lines.entry(191), Built, brokenOff(OneInstance, 1134),
-            lines.failure(OneInstance + " failed", 215), lines.exit(217)})));
+        ElementsAreArray(sequence({lines.entry(191), builtLines, brokenOff(oneInstance, 1134),
+            lines.failure(oneInstance + " failed", 215), lines.exit(217)})));
 }
 
 // The request searches the capabilities of a factory that has only sensors.
@@ -112,8 +113,8 @@ TEST_F(CapabilitiesProviderTraceTest, OfAnInstanceSearchedByItsPath)
 {
     const HandlerLines lines = handler("GetInstance");
     EXPECT_THAT(traceOfOne({{"Other", "x"}}),
-        ElementsAreArray(sequence(
-            {lines.entry(191), builtFactory({"_createSensorMap"}), Instances, lines.exit(283)})));
+        ElementsAreArray(sequence({lines.entry(191), builtFactory({"_createSensorMap"}),
+            instanceRequest, lines.exit(283)})));
 }
 
 TEST_F(CapabilitiesProviderTraceTest, OfARequestWithoutKeysHasNoFactory)

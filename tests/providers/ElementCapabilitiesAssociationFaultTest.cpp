@@ -19,12 +19,13 @@ class ElementCapabilitiesFaultSweepTest : public ElementCapabilitiesFaultTest,
                                           public ::testing::WithParamInterface<RequestKind> {};
 
 INSTANTIATE_TEST_SUITE_P(Instances, ElementCapabilitiesFaultSweepTest,
-    ::testing::Values(Names, Instances, OneInstance, Kinds.one("instanceWithoutKeys", Keyless)),
+    ::testing::Values(
+        nameRequest, instanceRequest, oneInstance, kinds.one("instanceWithoutKeys", keylessSource)),
     ::testing::PrintToStringParamName());
 INSTANTIATE_TEST_SUITE_P(FromSensor, ElementCapabilitiesFaultSweepTest,
-    ::testing::ValuesIn(FromSensor), ::testing::PrintToStringParamName());
+    ::testing::ValuesIn(requestsFromSensor), ::testing::PrintToStringParamName());
 INSTANTIATE_TEST_SUITE_P(FromCapabilities, ElementCapabilitiesFaultSweepTest,
-    ::testing::ValuesIn(FromCapabilities), ::testing::PrintToStringParamName());
+    ::testing::ValuesIn(requestsFromCapabilities), ::testing::PrintToStringParamName());
 
 TEST_P(ElementCapabilitiesFaultSweepTest, IsSurvivedAndAnswersWithNothingMadeUp)
 {
@@ -44,14 +45,14 @@ class ElementCapabilitiesAssociationFaultTest : public ElementCapabilitiesFaultT
 TEST_F(ElementCapabilitiesAssociationFaultTest, ATargetThatCannotBeMadeIsNoTarget)
 {
     const std::string names[] = {"Associators", "AssociatorsNames", "References", "ReferenceNames"};
-    for (const FaultManner manner : Undelivered)
-        for (const auto& kinds : {FromSensor, FromCapabilities})
+    for (const FaultManner manner : undelivered)
+        for (const auto& kinds : {requestsFromSensor, requestsFromCapabilities})
             for (const Which which : {Associators, AssociatorNames, References, ReferenceNames}) {
                 const auto request =
                     run(kinds[which], {BrokerCall::newObjectPath, 1, manner, CMPI_RC_OK});
                 const std::string text = "Object Path is NULL in " + names[which] + ".";
                 expectBrokenOff(*request, text);
-                EXPECT_EQ(request->lastMessage(), (BrokerMessage{2, Provider, text}));
+                EXPECT_EQ(request->lastMessage(), (BrokerMessage{2, provider, text}));
             }
 }
 
@@ -63,7 +64,7 @@ TEST_F(ElementCapabilitiesAssociationFaultTest, FarEndsThatCannotBeMadeEndInTheF
     for (const Which which : {AssociatorNames, References, ReferenceNames})
         for (const bool fromSensor : {true, false}) {
             const auto [request, lines] =
-                runTraced((fromSensor ? FromSensor : FromCapabilities)[which],
+                runTraced((fromSensor ? requestsFromSensor : requestsFromCapabilities)[which],
                     {BrokerCall::newObjectPath, which == AssociatorNames ? 2U : 3U,
                         FaultManner::nullResult});
             EXPECT_EQ(request->status.rc, CMPI_RC_ERR_FAILED);
@@ -83,10 +84,10 @@ TEST_F(ElementCapabilitiesAssociationFaultTest, FarEndsThatCannotBeMadeEndInTheF
 
 TEST_F(ElementCapabilitiesAssociationFaultTest, WithoutAnAssociationPathThereAreNoReferences)
 {
-    for (const FaultManner manner : Undelivered)
+    for (const FaultManner manner : undelivered)
         for (const Which which : {References, ReferenceNames}) {
-            const auto [request, lines] = runTraced(
-                FromSensor[which], {BrokerCall::newObjectPath, 2, manner, CMPI_RC_ERR_FAILED});
+            const auto [request, lines] = runTraced(requestsFromSensor[which],
+                {BrokerCall::newObjectPath, 2, manner, CMPI_RC_ERR_FAILED});
             EXPECT_EQ(request->status.rc, CMPI_RC_ERR_FAILED); // as the broker left it
             const HandlerLines expected =
                 handler(which == References ? "SensorElementCapabilities_References"
@@ -100,27 +101,28 @@ TEST_F(ElementCapabilitiesAssociationFaultTest, WithoutAnAssociationPathThereAre
 
 TEST_F(ElementCapabilitiesAssociationFaultTest, EveryAssociatorNameIsGivenItsNamespaceOnceMore)
 {
-    run(FromCapabilities[AssociatorNames], std::vector<Fault>{});
+    run(requestsFromCapabilities[AssociatorNames], std::vector<Fault>{});
     EXPECT_EQ(timesCalled("setNameSpace", SensorClass), 1 + 2 * 2); // and the target's
-    run(FromSensor[AssociatorNames], std::vector<Fault>{});
+    run(requestsFromSensor[AssociatorNames], std::vector<Fault>{});
     EXPECT_EQ(timesCalled("setNameSpace", CapabilitiesClass), 1 + 2);
 }
 
 TEST_F(ElementCapabilitiesAssociationFaultTest, AssociatorsEndInTheStatusThatTheBrokerLeft)
 {
-    const auto capabilities = run(FromSensor[Associators],
+    const auto capabilities = run(requestsFromSensor[Associators],
         {BrokerCall::newObjectPath, 2, FaultManner::nullResult, CMPI_RC_ERR_ACCESS_DENIED});
     EXPECT_EQ(capabilities->status.rc, CMPI_RC_ERR_ACCESS_DENIED);
-    const auto sensors = runWithLast(FromCapabilities[Associators], BrokerCall::newArray);
+    const auto sensors = runWithLast(requestsFromCapabilities[Associators], BrokerCall::newArray);
     EXPECT_EQ(sensors->status.rc, CMPI_RC_ERR_ACCESS_DENIED);
     EXPECT_EQ(sensors->answer.instances().size(), 2U);
 }
 
 TEST_F(ElementCapabilitiesAssociationFaultTest, AReferenceThatCannotBeMadeIsLeftOut)
 {
-    for (const FaultManner manner : Undelivered)
+    for (const FaultManner manner : undelivered)
         for (const Which which : {References, ReferenceNames}) {
-            const auto request = run(FromCapabilities[which], {BrokerCall::newInstance, 1, manner});
+            const auto request =
+                run(requestsFromCapabilities[which], {BrokerCall::newInstance, 1, manner});
             EXPECT_EQ(request->status.rc, CMPI_RC_OK);
             EXPECT_EQ(request->answer.paths().size() + request->answer.instances().size(), 1U);
             EXPECT_EQ(request->answer.refused(), 0U);
@@ -129,9 +131,9 @@ TEST_F(ElementCapabilitiesAssociationFaultTest, AReferenceThatCannotBeMadeIsLeft
 
 TEST_F(ElementCapabilitiesAssociationFaultTest, AReferenceWhosePathIsNotToldIsLeftOutOfTheNames)
 {
-    for (const FaultManner manner : Undelivered) {
+    for (const FaultManner manner : undelivered) {
         const auto request =
-            run(FromCapabilities[ReferenceNames], {BrokerCall::getObjectPath, 1, manner});
+            run(requestsFromCapabilities[ReferenceNames], {BrokerCall::getObjectPath, 1, manner});
         EXPECT_EQ(request->answer.paths().size(), 1U);
         EXPECT_EQ(request->answer.refused(), 0U);
     }
@@ -139,8 +141,8 @@ TEST_F(ElementCapabilitiesAssociationFaultTest, AReferenceWhosePathIsNotToldIsLe
 
 TEST_F(ElementCapabilitiesAssociationFaultTest, AMissingArrayStandsInTheStatusBesideTheAssociator)
 {
-    const auto request = run(
-        FromSensor[Associators], {BrokerCall::newArray, 1, FaultManner::nullResult, CMPI_RC_OK});
+    const auto request = run(requestsFromSensor[Associators],
+        {BrokerCall::newArray, 1, FaultManner::nullResult, CMPI_RC_OK});
     EXPECT_EQ(request->status.rc, CMPI_RC_ERR_FAILED);
     EXPECT_EQ(request->message(),
         "Creating array for Property" + std::string(25, ' ') + "RequestedStatesSupported failed.");
@@ -151,8 +153,8 @@ TEST_F(ElementCapabilitiesAssociationFaultTest, AMissingArrayStandsInTheStatusBe
 
 TEST_F(ElementCapabilitiesAssociationFaultTest, AnAssociatorThatCannotBeMadeIsPassedOnAsItIs)
 {
-    for (const FaultManner manner : Undelivered)
-        for (const auto& kinds : {FromSensor, FromCapabilities}) {
+    for (const FaultManner manner : undelivered)
+        for (const auto& kinds : {requestsFromSensor, requestsFromCapabilities}) {
             const auto request = run(kinds[Associators], {BrokerCall::newInstance, 1, manner});
             EXPECT_EQ(request->status.rc, CMPI_RC_OK);
             EXPECT_EQ(request->answer.refused(), 1U);
@@ -163,15 +165,15 @@ TEST_F(ElementCapabilitiesAssociationFaultTest, AnAssociatorThatCannotBeMadeIsPa
 TEST_F(ElementCapabilitiesAssociationFaultTest, APathThatIsNotToldLeavesTheStatus)
 {
     const Fault fault = {BrokerCall::getObjectPath, 2, FaultManner::nullResult}; // the last
-    for (const RequestKind& kind : {OneInstance, FromCapabilities[ReferenceNames]})
+    for (const RequestKind& kind : {oneInstance, requestsFromCapabilities[ReferenceNames]})
         EXPECT_EQ(run(kind, fault)->status.rc, CMPI_RC_OK) << kind;
 }
 
 TEST_F(ElementCapabilitiesAssociationFaultTest, NamespacesAndClassNamesLeaveTheStatus)
 {
     const RequestKind alongAnother = {
-        "alongAnother", Sensor, [](auto* broker, auto* context, auto* result, auto* path) {
-            CMPIAssociationMI* const mi = Kinds.associationFactory(broker, nullptr, nullptr);
+        "alongAnother", sensorSource, [](auto* broker, auto* context, auto* result, auto* path) {
+            CMPIAssociationMI* const mi = kinds.associationFactory(broker, nullptr, nullptr);
             return mi->ft->associators(mi, context, result, path, "ZUMLO_SensorSystemDevice",
                 nullptr, nullptr, nullptr, nullptr);
         }};
@@ -179,8 +181,8 @@ TEST_F(ElementCapabilitiesAssociationFaultTest, NamespacesAndClassNamesLeaveTheS
     const auto unnamed =
         runWithLast(alongAnother, BrokerCall::getClassName, FaultManner::nullResult);
     EXPECT_EQ(unnamed->status.rc, CMPI_RC_OK);
-    expectNamespacesLeaveTheStatus(Names);
-    for (const auto& kinds : {FromSensor, FromCapabilities})
+    expectNamespacesLeaveTheStatus(nameRequest);
+    for (const auto& kinds : {requestsFromSensor, requestsFromCapabilities})
         for (const Which which : {Associators, AssociatorNames, References, ReferenceNames})
             expectNamespacesLeaveTheStatus(kinds[which]);
 }

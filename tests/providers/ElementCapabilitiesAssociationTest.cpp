@@ -13,13 +13,13 @@ using ::testing::ElementsAre;
 using ::testing::IsEmpty;
 
 constexpr const char* Class = "ZUMLO_SensorElementCapabilities";
-constexpr const char* Provider = "SensorElementCapabilitiesProvider";
-const std::string Cap = CapabilitiesID;
+constexpr const char* provider = "SensorElementCapabilitiesProvider";
+const std::string cap = capabilitiesId;
 
 class ElementCapabilitiesAssociationTest : public AssociationTest {
 protected:
     explicit ElementCapabilitiesAssociationTest(
-        const std::vector<ScriptedNode>& nodes = ThreeSensors)
+        const std::vector<ScriptedNode>& nodes = threeSensors)
         : AssociationTest(SensorElementCapabilitiesProvider_Create_InstanceMI,
               SensorElementCapabilitiesProvider_Create_AssociationMI, nodes, {"host"})
     {
@@ -36,7 +36,7 @@ protected:
         expectFailure(status, text);
         expectNothing(false);
         ASSERT_FALSE(messages_.empty());
-        EXPECT_EQ(messages_.back(), (BrokerMessage{2, Provider, text}));
+        EXPECT_EQ(messages_.back(), (BrokerMessage{2, provider, text}));
         messages_.clear();
     }
 
@@ -60,13 +60,13 @@ TEST_F(ElementCapabilitiesAssociationTest, ASensorIsAssociatedWithTheCapabilitie
     ASSERT_EQ(answer_.instances().size(), 1U);
     const Host::Instance& only = *answer_.instances()[0];
     EXPECT_THAT(describe(only.properties()),
-        ElementsAre("InstanceID = string \"" + Cap + "\"",
+        ElementsAre("InstanceID = string \"" + cap + "\"",
             "RequestedStatesSupported = [uint16 0, uint16 1, uint16 2]",
             "ElementNameEditSupported = false"));
     EXPECT_EQ(only.objectPath().toText(), capabilities("root/other").toText());
     EXPECT_FALSE(answer_.isDone());
     EXPECT_THAT(
-        messages_, ElementsAre(BrokerMessage{1, Provider, "Target Class is PhysicalPackageClass"}));
+        messages_, ElementsAre(BrokerMessage{1, provider, "Target Class is PhysicalPackageClass"}));
 }
 
 TEST_F(ElementCapabilitiesAssociationTest, CapabilitiesAreAssociatedWithEverySensor)
@@ -77,7 +77,7 @@ TEST_F(ElementCapabilitiesAssociationTest, CapabilitiesAreAssociatedWithEverySen
     EXPECT_EQ(answer_.instances()[0]->properties().size(), 22U); // all but the six thresholds
     EXPECT_FALSE(answer_.isDone());
     EXPECT_THAT(
-        messages_, ElementsAre(BrokerMessage{1, Provider, "Target Class is ComputerSystemClass"}));
+        messages_, ElementsAre(BrokerMessage{1, provider, "Target Class is ComputerSystemClass"}));
 }
 
 TEST_F(ElementCapabilitiesAssociationTest, AssociatorsHaveTheListedProperties)
@@ -105,7 +105,7 @@ TEST_F(ElementCapabilitiesWithoutSensorsTest, AssociatorsOfCapabilitiesAreAnOpen
     expectOk(associators(capabilities()));
     expectNothing(false);
     expectOk(associators(sensor("A:/1"))); // the source need not exist
-    EXPECT_THAT(delivered(), ElementsAre(Cap));
+    EXPECT_THAT(delivered(), ElementsAre(cap));
 }
 
 // ---- AssociatorNames ----
@@ -117,7 +117,7 @@ TEST_F(ElementCapabilitiesAssociationTest, NamesOfAssociatorsAreThePathsOfTheFar
     EXPECT_EQ(answer_.paths()[0]->toText(), capabilities("root/other").toText());
     expectOk(associatorNames(capabilities("root/other"), {.associationClass = Class}));
     ASSERT_EQ(answer_.paths().size(), 4U);
-    EXPECT_THAT(delivered(), ElementsAre(Cap, "A:/1", "B:/2", "C:/3"));
+    EXPECT_THAT(delivered(), ElementsAre(cap, "A:/1", "B:/2", "C:/3"));
     EXPECT_EQ(answer_.paths()[2]->toText(), sensor("B:/2", "root/other").toText());
     EXPECT_FALSE(answer_.isDone());
 }
@@ -137,7 +137,7 @@ TEST_F(ElementCapabilitiesAssociationTest, NoFilterButTheAssociationClassTakesPa
     expectOk(associatorNames(sensor("A:/1"), filter));
     expectOk(associators(
         sensor("A:/1"), {Class, CapabilitiesClass, "Capabilities", "ManagedElement", nullptr}));
-    EXPECT_THAT(delivered(), ElementsAre(Cap, Cap, Cap));
+    EXPECT_THAT(delivered(), ElementsAre(cap, cap, cap));
     expectOk(references(sensor("A:/1"), filter));
     expectOk(referenceNames(sensor("A:/1"), filter));
     EXPECT_EQ(answer_.instances().size(), 3U);
@@ -148,7 +148,7 @@ TEST_F(ElementCapabilitiesAssociationTest, TheSourcesKeysDoNotMatter)
 {
     expectOk(associatorNames(path(SensorClass)));
     expectOk(associatorNames(path(CapabilitiesClass, {{"InstanceID", "other"}})));
-    EXPECT_THAT(delivered(), ElementsAre(Cap, "A:/1", "B:/2", "C:/3"));
+    EXPECT_THAT(delivered(), ElementsAre(cap, "A:/1", "B:/2", "C:/3"));
 }
 
 TEST_F(ElementCapabilitiesAssociationTest, KeysOfOtherTypesDoNotMatterEither)
@@ -239,7 +239,7 @@ TEST_F(ElementCapabilitiesAssociationTest, ReferencesOfASensorPairItWithTheCapab
     EXPECT_EQ(only.objectPath().host(), systemName_);
     EXPECT_FALSE(answer_.isDone());
     EXPECT_THAT(
-        messages_, ElementsAre(BrokerMessage{1, Provider, "Target Class is PhysicalPackageClass"}));
+        messages_, ElementsAre(BrokerMessage{1, provider, "Target Class is PhysicalPackageClass"}));
 }
 
 TEST_F(ElementCapabilitiesAssociationTest, ReferencesOfCapabilitiesPairThemWithEverySensor)
@@ -258,7 +258,7 @@ TEST_F(ElementCapabilitiesAssociationTest, NamesOfReferencesAreThePathsOfTheSame
 {
     expectOk(referenceNames(capabilities("root/other")));
     expectOk(referenceNames(sensor("D:/4", "root/other")));
-    EXPECT_THAT(pairs(), ElementsAre("A:/1 " + Cap, "B:/2 " + Cap, "C:/3 " + Cap, "D:/4 " + Cap));
+    EXPECT_THAT(pairs(), ElementsAre("A:/1 " + cap, "B:/2 " + cap, "C:/3 " + cap, "D:/4 " + cap));
     expectAssociationPaths(Class, "root/other");
     EXPECT_FALSE(answer_.isDone());
 }
@@ -285,7 +285,7 @@ TEST_F(ElementCapabilitiesWithoutSensorsTest, ReferencesOfCapabilitiesAreAnOpenE
     expectOk(referenceNames(capabilities()));
     expectNothing(false);
     expectOk(referenceNames(sensor("A:/1")));
-    EXPECT_THAT(pairs(), ElementsAre("A:/1 " + Cap));
+    EXPECT_THAT(pairs(), ElementsAre("A:/1 " + cap));
 }
 
 } // namespace ElementCapabilitiesAssociationTests

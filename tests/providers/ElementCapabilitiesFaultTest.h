@@ -13,21 +13,22 @@
 namespace Testing::ElementCapabilities {
 
 inline constexpr const char* Class = "ZUMLO_SensorElementCapabilities";
-inline constexpr const char* Provider = "SensorElementCapabilitiesProvider";
+inline constexpr const char* provider = "SensorElementCapabilitiesProvider";
 
-inline const RequestKinds Kinds = {SensorElementCapabilitiesProvider_Create_InstanceMI,
+inline const RequestKinds kinds = {SensorElementCapabilitiesProvider_Create_InstanceMI,
     SensorElementCapabilitiesProvider_Create_AssociationMI};
-inline const SourceMaker Keyless = pathMaker(Class);
-inline const SourceMaker Sensor = sensorMaker("B:/2");
-inline const SourceMaker Capabilities =
+inline const SourceMaker keylessSource = pathMaker(Class);
+inline const SourceMaker sensorSource = sensorMaker("B:/2");
+inline const SourceMaker capabilitiesSource =
     pathMaker(CapabilitiesClass, "InstanceID", "ZUMLO:SensorEnabledLogicalElementCap1");
 
-inline const RequestKind Names = Kinds.names(Keyless);
-inline const RequestKind Instances = Kinds.instances(Keyless);
-inline const RequestKind OneInstance = Kinds.one(
-    "oneInstance", pairMaker(Class, "ManagedElement", Sensor, "Capabilities", Capabilities));
-inline const AssociationRequests FromSensor = Kinds.along("Sensor", Sensor);
-inline const AssociationRequests FromCapabilities = Kinds.along("Capabilities", Capabilities);
+inline const RequestKind nameRequest = kinds.names(keylessSource);
+inline const RequestKind instanceRequest = kinds.instances(keylessSource);
+inline const RequestKind oneInstance = kinds.one("oneInstance",
+    pairMaker(Class, "ManagedElement", sensorSource, "Capabilities", capabilitiesSource));
+inline const AssociationRequests requestsFromSensor = kinds.along("Sensor", sensorSource);
+inline const AssociationRequests requestsFromCapabilities =
+    kinds.along("Capabilities", capabilitiesSource);
 
 class ElementCapabilitiesFaultTest : public AssociationFaultTest {
 protected:
@@ -35,7 +36,7 @@ protected:
 
     static HandlerLines handler(const std::string& function)
     {
-        return {"SensorElementCapabilities", Provider, function};
+        return {"SensorElementCapabilities", provider, function};
     }
 };
 

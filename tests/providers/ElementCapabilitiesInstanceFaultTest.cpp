@@ -12,7 +12,7 @@ using namespace Testing;
 using namespace Testing::ElementCapabilities;
 using namespace ::testing;
 
-const std::string Gap(21, ' ');
+const std::string columnGap(21, ' ');
 
 class ElementCapabilitiesInstanceFaultTest : public ElementCapabilitiesFaultTest {
 protected:
@@ -20,9 +20,9 @@ protected:
     void expectBuilderFailure(const Fault& fault, const std::string& statusText,
         const std::string& traceText, const std::string& messageText)
     {
-        for (const RequestKind& kind : {Instances, OneInstance}) {
+        for (const RequestKind& kind : {instanceRequest, oneInstance}) {
             const auto [request, lines] = runTraced(kind, fault);
-            expectEmptyAnswer(*request, statusText, {2, Provider, traceText});
+            expectEmptyAnswer(*request, statusText, {2, provider, traceText});
             const HandlerLines builder = handler("sensorElementCapabilitiesCMPIInstances");
             const HandlerLines outer =
                 handler(kind.name == "instances" ? "SensorElementCapabilities_EnumInstances"
@@ -36,9 +36,9 @@ protected:
     void expectNamesFailure(
         const Fault& fault, const std::string& statusText, const std::string& traceText)
     {
-        const auto [request, lines] = runTraced(Names, fault);
+        const auto [request, lines] = runTraced(nameRequest, fault);
         expectBrokenOff(*request, statusText);
-        EXPECT_THAT(request->messages, ElementsAre(BrokerMessage{2, Provider, traceText}));
+        EXPECT_THAT(request->messages, ElementsAre(BrokerMessage{2, provider, traceText}));
         const HandlerLines names = handler("SensorElementCapabilities_EnumInstanceNames");
         EXPECT_THAT(lines,
             ElementsAreArray(sequence({names.entry(), names.failure(statusText), names.exit()})));
@@ -48,18 +48,18 @@ protected:
 // ---- The iteration over all pairs. Paths are made in this order: both sensors, then for each
 // ---- sensor the capabilities and the association. A sensor has four keys, capabilities one. ----
 
-constexpr unsigned FirstSensor = 1;
-constexpr unsigned FirstCapabilities = 3;
-constexpr unsigned FirstAssociation = 4;
-constexpr unsigned SecondAssociation = 6;
-constexpr unsigned LastKeyOfFirstSensor = 4;
-constexpr unsigned KeyOfFirstCapabilities = 9;
+constexpr unsigned firstSensor = 1;
+constexpr unsigned firstCapabilities = 3;
+constexpr unsigned firstAssociation = 4;
+constexpr unsigned secondAssociation = 6;
+constexpr unsigned lastKeyOfFirstSensor = 4;
+constexpr unsigned keyOfFirstCapabilities = 9;
 
 TEST_F(ElementCapabilitiesInstanceFaultTest, NamesWithoutSensorPathsEndInTheFactorysStatus)
 {
-    for (const FaultManner manner : Undelivered) {
+    for (const FaultManner manner : undelivered) {
         const auto [request, lines] =
-            runTraced(Names, {BrokerCall::newObjectPath, FirstSensor, manner});
+            runTraced(nameRequest, {BrokerCall::newObjectPath, firstSensor, manner});
         expectBrokenOff(*request, "Create CMPIObjectPath failed.");
         EXPECT_EQ(request->messages.size(), 1U); // the factory's
         EXPECT_EQ(lines, handler("SensorElementCapabilities_EnumInstanceNames").entry());
@@ -68,9 +68,9 @@ TEST_F(ElementCapabilitiesInstanceFaultTest, NamesWithoutSensorPathsEndInTheFact
 
 TEST_F(ElementCapabilitiesInstanceFaultTest, NamesWithoutCapabilitiesPathsEndInTheFactorysStatus)
 {
-    for (const FaultManner manner : Undelivered) {
+    for (const FaultManner manner : undelivered) {
         const auto [request, lines] =
-            runTraced(Names, {BrokerCall::newObjectPath, FirstCapabilities, manner});
+            runTraced(nameRequest, {BrokerCall::newObjectPath, firstCapabilities, manner});
         expectBrokenOff(*request, "Create CMPIObjectPath failed");
         EXPECT_EQ(lines, handler("SensorElementCapabilities_EnumInstanceNames").entry());
     }
@@ -78,15 +78,15 @@ TEST_F(ElementCapabilitiesInstanceFaultTest, NamesWithoutCapabilitiesPathsEndInT
 
 TEST_F(ElementCapabilitiesInstanceFaultTest, NamesEndAtAnAssociationPathThatCannotBeMade)
 {
-    const std::string text = "Create CMPIObjectPath failed" + Gap + "for ElementCapabilities";
-    for (const FaultManner manner : Undelivered)
-        expectNamesFailure({BrokerCall::newObjectPath, FirstAssociation, manner}, text, text + ".");
+    const std::string text = "Create CMPIObjectPath failed" + columnGap + "for ElementCapabilities";
+    for (const FaultManner manner : undelivered)
+        expectNamesFailure({BrokerCall::newObjectPath, firstAssociation, manner}, text, text + ".");
 }
 
 TEST_F(ElementCapabilitiesInstanceFaultTest, NamesBeforeAFailureAreDelivered)
 {
     const auto request =
-        run(Names, {BrokerCall::newObjectPath, SecondAssociation, FaultManner::nullResult});
+        run(nameRequest, {BrokerCall::newObjectPath, secondAssociation, FaultManner::nullResult});
     EXPECT_EQ(request->status.rc, CMPI_RC_ERR_FAILED);
     EXPECT_EQ(request->answer.paths().size(), 1U);
     EXPECT_FALSE(request->answer.isDone());
@@ -96,20 +96,20 @@ TEST_F(ElementCapabilitiesInstanceFaultTest, NamesEndAtASensorPathThatIsGone)
 {
     const std::string text = "CMPIObjectPath is NULL for Sensor class";
     expectNamesFailure(
-        {BrokerCall::addKey, LastKeyOfFirstSensor, FaultManner::lostHandle}, text, text);
+        {BrokerCall::addKey, lastKeyOfFirstSensor, FaultManner::lostHandle}, text, text);
 }
 
 TEST_F(ElementCapabilitiesInstanceFaultTest, NamesEndAtACapabilitiesPathThatIsGone)
 {
-    expectNamesFailure({BrokerCall::addKey, KeyOfFirstCapabilities, FaultManner::lostHandle},
-        "CMPIObjectPath is" + Gap + "NULL for SensorEnabledLogicalElementCap",
-        "CMPIObjectPath is NULL for" + Gap + "EnabledLogicalElementCap");
+    expectNamesFailure({BrokerCall::addKey, keyOfFirstCapabilities, FaultManner::lostHandle},
+        "CMPIObjectPath is" + columnGap + "NULL for SensorEnabledLogicalElementCap",
+        "CMPIObjectPath is NULL for" + columnGap + "EnabledLogicalElementCap");
 }
 
 TEST_F(ElementCapabilitiesInstanceFaultTest, TheBuilderReportsSensorPathsThatCannotBeMade)
 {
-    for (const FaultManner manner : Undelivered)
-        expectBuilderFailure({BrokerCall::newObjectPath, FirstSensor, manner},
+    for (const FaultManner manner : undelivered)
+        expectBuilderFailure({BrokerCall::newObjectPath, firstSensor, manner},
             "Create CMPIObjectPath failed.",
             "***Can't get Sensor ObjectPaths." + std::string(13, ' ') +
                 "Exiting EnumerateInstanceNames***",
@@ -119,8 +119,8 @@ TEST_F(ElementCapabilitiesInstanceFaultTest, TheBuilderReportsSensorPathsThatCan
 TEST_F(ElementCapabilitiesInstanceFaultTest, TheBuilderReportsCapabilitiesPathsThatCannotBeMade)
 {
     const std::string gap(17, ' ');
-    for (const FaultManner manner : Undelivered)
-        expectBuilderFailure({BrokerCall::newObjectPath, FirstCapabilities, manner},
+    for (const FaultManner manner : undelivered)
+        expectBuilderFailure({BrokerCall::newObjectPath, firstCapabilities, manner},
             "Create CMPIObjectPath failed",
             "***Can't get ObjectPaths for" + gap + "EnabledLogicalElementCap" + gap +
                 "Exiting EnumerateInstanceNames***",
@@ -130,14 +130,14 @@ TEST_F(ElementCapabilitiesInstanceFaultTest, TheBuilderReportsCapabilitiesPathsT
 TEST_F(ElementCapabilitiesInstanceFaultTest, TheBuilderReportsAnAssociationPathThatCannotBeMade)
 {
     const std::string text = "Create CMPIObjectPath failed for ElementCapabilities";
-    for (const FaultManner manner : Undelivered)
-        for (const unsigned nth : {FirstAssociation, SecondAssociation})
+    for (const FaultManner manner : undelivered)
+        for (const unsigned nth : {firstAssociation, secondAssociation})
             expectBuilderFailure({BrokerCall::newObjectPath, nth, manner}, text, text + ".", text);
 }
 
 TEST_F(ElementCapabilitiesInstanceFaultTest, TheBuilderReportsASensorPathThatIsGone)
 {
-    expectBuilderFailure({BrokerCall::addKey, LastKeyOfFirstSensor, FaultManner::lostHandle},
+    expectBuilderFailure({BrokerCall::addKey, lastKeyOfFirstSensor, FaultManner::lostHandle},
         "CMPIObjectPath is" + std::string(17, ' ') + "NULL for Sensor",
         "CMPIObjectPath is NULL for Sensor", "CMPIObjectPath is NULL for Sensor");
 }
@@ -145,14 +145,14 @@ TEST_F(ElementCapabilitiesInstanceFaultTest, TheBuilderReportsASensorPathThatIsG
 TEST_F(ElementCapabilitiesInstanceFaultTest, TheBuilderReportsACapabilitiesPathThatIsGone)
 {
     const std::string text = "CMPIObjectPath is NULL for EnabledLogicalElementCap";
-    expectBuilderFailure({BrokerCall::addKey, KeyOfFirstCapabilities, FaultManner::lostHandle},
-        "CMPIObjectPath is" + Gap + "NULL for EnabledLogicalElementCap", text, text);
+    expectBuilderFailure({BrokerCall::addKey, keyOfFirstCapabilities, FaultManner::lostHandle},
+        "CMPIObjectPath is" + columnGap + "NULL for EnabledLogicalElementCap", text, text);
 }
 
 TEST_F(ElementCapabilitiesInstanceFaultTest, AnInstanceThatCannotBeMadeIsPassedOnAsItIs)
 {
-    for (const FaultManner manner : Undelivered) {
-        const auto request = run(Instances, {BrokerCall::newInstance, 1, manner});
+    for (const FaultManner manner : undelivered) {
+        const auto request = run(instanceRequest, {BrokerCall::newInstance, 1, manner});
         EXPECT_EQ(request->status.rc, CMPI_RC_OK);
         EXPECT_EQ(request->answer.refused(), 1U);
         EXPECT_EQ(request->answer.instances().size(), 1U);
@@ -162,8 +162,8 @@ TEST_F(ElementCapabilitiesInstanceFaultTest, AnInstanceThatCannotBeMadeIsPassedO
 
 TEST_F(ElementCapabilitiesInstanceFaultTest, AnInstanceThatCannotBeMadeIsPassedOverInASearch)
 {
-    for (const FaultManner manner : Undelivered) {
-        const auto request = run(OneInstance, {BrokerCall::newInstance, 1, manner});
+    for (const FaultManner manner : undelivered) {
+        const auto request = run(oneInstance, {BrokerCall::newInstance, 1, manner});
         EXPECT_EQ(request->status.rc, CMPI_RC_OK);
         EXPECT_EQ(request->answer.instances().size(), 1U); // the pair is the second one
         EXPECT_EQ(request->answer.refused(), 0U);
@@ -172,7 +172,7 @@ TEST_F(ElementCapabilitiesInstanceFaultTest, AnInstanceThatCannotBeMadeIsPassedO
 
 TEST_F(ElementCapabilitiesInstanceFaultTest, TheFilterIsSetBeforeTheReferences)
 {
-    run(Instances, {BrokerCall::setPropertyFilter, 1, FaultManner::errorStatus});
+    run(instanceRequest, {BrokerCall::setPropertyFilter, 1, FaultManner::errorStatus});
     const std::vector<BrokerCall>& calls = faulty_->calls();
     EXPECT_LT(std::find(calls.begin(), calls.end(), BrokerCall::setPropertyFilter),
         std::find(calls.begin(), calls.end(), BrokerCall::setProperty));
@@ -180,7 +180,7 @@ TEST_F(ElementCapabilitiesInstanceFaultTest, TheFilterIsSetBeforeTheReferences)
 
 TEST_F(ElementCapabilitiesInstanceFaultTest, APathThatCannotCountItsKeysHasNone)
 {
-    const auto request = run(OneInstance, {BrokerCall::getKeyCount, 1, FaultManner::nullResult});
+    const auto request = run(oneInstance, {BrokerCall::getKeyCount, 1, FaultManner::nullResult});
     EXPECT_EQ(request->status.rc, CMPI_RC_ERR_FAILED);
     EXPECT_EQ(request->message(), "At least one key should be passed");
     EXPECT_TRUE(request->answer.isDone());
@@ -188,19 +188,19 @@ TEST_F(ElementCapabilitiesInstanceFaultTest, APathThatCannotCountItsKeysHasNone)
 
 TEST_F(ElementCapabilitiesInstanceFaultTest, APathWhoseKeyCountReportsAFailureLeavesTheStatus)
 {
-    const auto request = run(OneInstance, {BrokerCall::getKeyCount, 1, FaultManner::errorStatus});
+    const auto request = run(oneInstance, {BrokerCall::getKeyCount, 1, FaultManner::errorStatus});
     EXPECT_EQ(request->status.rc, CMPI_RC_OK);
     EXPECT_EQ(request->answer.instances().size(), 1U);
 }
 
 TEST_F(ElementCapabilitiesInstanceFaultTest, TheCapabilitiesAreGivenTheirNamespaceBeforeTheSensor)
 {
-    expectNameSpacesInOrder(Names, Class, CapabilitiesClass, SensorClass);
+    expectNameSpacesInOrder(nameRequest, Class, CapabilitiesClass, SensorClass);
 }
 
 TEST_F(ElementCapabilitiesInstanceFaultTest, EveryValueIsWhole)
 {
-    expectWholeValues(Names, Instances, {"Capabilities", CapabilitiesClass});
+    expectWholeValues(nameRequest, instanceRequest, {"Capabilities", CapabilitiesClass});
 }
 
 } // namespace ElementCapabilitiesInstanceFaultTests

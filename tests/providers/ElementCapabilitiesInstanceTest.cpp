@@ -14,25 +14,25 @@ using ::testing::ElementsAre;
 using ::testing::IsEmpty;
 
 constexpr const char* Class = "ZUMLO_SensorElementCapabilities";
-constexpr const char* Provider = "SensorElementCapabilitiesProvider";
-constexpr const char* NoKeyText = "At least one key should be passed";
-const std::string Cap = CapabilitiesID;
+constexpr const char* provider = "SensorElementCapabilitiesProvider";
+constexpr const char* noKeyText = "At least one key should be passed";
+const std::string cap = capabilitiesId;
 
-const AssociationClass Association = {Class, "ManagedElement", "Capabilities",
+const AssociationClass association = {Class, "ManagedElement", "Capabilities",
     SensorElementCapabilitiesProvider_Create_InstanceMI,
     SensorElementCapabilitiesProvider_Create_AssociationMI};
 
 class ElementCapabilitiesInstanceTest : public AssociationInstanceTest {
 protected:
-    explicit ElementCapabilitiesInstanceTest(const std::vector<ScriptedNode>& nodes = ThreeSensors)
-        : AssociationInstanceTest(Association, nodes, {})
+    explicit ElementCapabilitiesInstanceTest(const std::vector<ScriptedNode>& nodes = threeSensors)
+        : AssociationInstanceTest(association, nodes, {})
     {
     }
 };
 
 class ElementCapabilitiesOfOneSensorTest : public ElementCapabilitiesInstanceTest {
 protected:
-    ElementCapabilitiesOfOneSensorTest() : ElementCapabilitiesInstanceTest({ThreeSensors[0]}) {}
+    ElementCapabilitiesOfOneSensorTest() : ElementCapabilitiesInstanceTest({threeSensors[0]}) {}
 };
 
 class ElementCapabilitiesOfNoSensorTest : public ElementCapabilitiesInstanceTest {
@@ -45,7 +45,7 @@ protected:
 TEST_F(ElementCapabilitiesInstanceTest, NamesArePairsOfEachSensorInOrder)
 {
     expectOk(enumerateNames(path(Class)));
-    EXPECT_THAT(pairs(), ElementsAre("A:/1 " + Cap, "B:/2 " + Cap, "C:/3 " + Cap));
+    EXPECT_THAT(pairs(), ElementsAre("A:/1 " + cap, "B:/2 " + cap, "C:/3 " + cap));
     EXPECT_TRUE(answer_.isDone());
     EXPECT_THAT(messages_, IsEmpty());
 }
@@ -66,7 +66,7 @@ TEST_F(ElementCapabilitiesInstanceTest, ANameIsAPathInTheRequestsNamespaceOnThis
 TEST_F(ElementCapabilitiesOfOneSensorTest, HasOneName)
 {
     expectOk(enumerateNames(path(Class)));
-    EXPECT_THAT(pairs(), ElementsAre("C:/3 " + Cap));
+    EXPECT_THAT(pairs(), ElementsAre("C:/3 " + cap));
 }
 
 TEST_F(ElementCapabilitiesOfNoSensorTest, HasNoNamesInAClosedResult)
@@ -91,7 +91,7 @@ TEST_F(ElementCapabilitiesInstanceTest, WithoutABrokerNamesFailWithoutAMessage)
 TEST_F(ElementCapabilitiesInstanceTest, InstancesArePairsOfEachSensorInOrder)
 {
     expectOk(enumerate(path(Class, {}, "root/other")));
-    EXPECT_THAT(pairs(), ElementsAre("A:/1 " + Cap, "B:/2 " + Cap, "C:/3 " + Cap));
+    EXPECT_THAT(pairs(), ElementsAre("A:/1 " + cap, "B:/2 " + cap, "C:/3 " + cap));
     const Host::Instance& third = *answer_.instances()[2];
     EXPECT_EQ(third.className(), Class);
     EXPECT_EQ(third.objectPath().nameSpace(), "root/other");
@@ -109,7 +109,7 @@ TEST_F(ElementCapabilitiesOfNoSensorTest, HasNoInstancesInAClosedResult)
     expectNothing(true);
     EXPECT_THAT(
         messages_, ElementsAre(BrokerMessage{1, "SensorProfileProvider", "***No instance found***"},
-                       BrokerMessage{2, Provider,
+                       BrokerMessage{2, provider,
                            "***Can't get Sensor ObjectPaths." + std::string(13, ' ') +
                                "Exiting EnumerateInstanceNames***"}));
 }
@@ -169,7 +169,7 @@ TEST_F(ElementCapabilitiesInstanceTest, TheBuilderKeepsWhatIsThereAndSaysWhether
 TEST_F(ElementCapabilitiesInstanceTest, AnInstanceIsFoundByItsReferences)
 {
     expectOk(get(pairPath(sensor("B:/2"), capabilities())));
-    EXPECT_THAT(pairs(), ElementsAre("B:/2 " + Cap));
+    EXPECT_THAT(pairs(), ElementsAre("B:/2 " + cap));
     EXPECT_TRUE(answer_.isDone());
     EXPECT_THAT(messages_, IsEmpty());
 }
@@ -178,7 +178,7 @@ TEST_F(ElementCapabilitiesInstanceTest, AnInstanceIsFoundWithAPropertyListToo)
 {
     const char* properties[] = {"Capabilities", nullptr};
     expectOk(get(pairPath(sensor("B:/2"), capabilities()), properties));
-    EXPECT_THAT(pairs(), ElementsAre("B:/2 " + Cap));
+    EXPECT_THAT(pairs(), ElementsAre("B:/2 " + cap));
 }
 
 TEST_F(ElementCapabilitiesInstanceTest, TheOrderOfTheKeysDoesNotMatter)
@@ -189,7 +189,7 @@ TEST_F(ElementCapabilitiesInstanceTest, TheOrderOfTheKeysDoesNotMatter)
         Host::Value::of(path(SensorClass,
             {{"SystemName", systemName_}, {"DeviceID", "C:/3"},
                 {"SystemCreationClassName", SystemClass}, {"CreationClassName", SensorClass}})));
-    EXPECT_THAT(got(ref), ElementsAre("C:/3 " + Cap));
+    EXPECT_THAT(got(ref), ElementsAre("C:/3 " + cap));
 }
 
 TEST_F(ElementCapabilitiesInstanceTest, TheLetterCaseOfNamesDoesNotMatter)
@@ -200,14 +200,14 @@ TEST_F(ElementCapabilitiesInstanceTest, TheLetterCaseOfNamesDoesNotMatter)
             {{"creationclassname", SensorClass}, {"deviceid", "A:/1"},
                 {"systemcreationclassname", SystemClass}, {"systemname", systemName_}})));
     ref.addKey("capabilities", Host::Value::of(path("ZUMLO_SENSORENABLEDLOGICALELEMENTCAPABILITIES",
-                                   {{"INSTANCEID", CapabilitiesID}}, "ROOT/CIMV2")));
-    EXPECT_THAT(got(ref), ElementsAre("A:/1 " + Cap));
+                                   {{"INSTANCEID", capabilitiesId}}, "ROOT/CIMV2")));
+    EXPECT_THAT(got(ref), ElementsAre("A:/1 " + cap));
 }
 
 TEST_F(ElementCapabilitiesInstanceTest, HostsAndAbsentNamespacesDoNotMatter)
 {
     for (const char* const host : {static_cast<const char*>(nullptr), "elsewhere"})
-        for (const char* const nameSpace : {static_cast<const char*>(nullptr), NameSpace}) {
+        for (const char* const nameSpace : {static_cast<const char*>(nullptr), testNameSpace}) {
             Host::ObjectPath& element = sensor("A:/1");
             Host::ObjectPath& capability = capabilities();
             for (Host::ObjectPath* const end : {&element, &capability}) {
@@ -216,7 +216,7 @@ TEST_F(ElementCapabilitiesInstanceTest, HostsAndAbsentNamespacesDoNotMatter)
             }
             Host::ObjectPath& ref = pairPath(element, capability);
             ref.setHost(host);
-            EXPECT_THAT(got(ref), ElementsAre("A:/1 " + Cap));
+            EXPECT_THAT(got(ref), ElementsAre("A:/1 " + cap));
         }
 }
 
@@ -259,9 +259,9 @@ TEST_F(ElementCapabilitiesInstanceTest, AReferenceOfAnotherTypeFindsNothing)
 
 TEST_F(ElementCapabilitiesInstanceTest, APathWithoutKeysIsRefusedInAClosedResult)
 {
-    expectFailure(get(path(Class)), NoKeyText);
+    expectFailure(get(path(Class)), noKeyText);
     expectNothing(true);
-    EXPECT_THAT(messages_, ElementsAre(BrokerMessage{2, Provider, NoKeyText}));
+    EXPECT_THAT(messages_, ElementsAre(BrokerMessage{2, provider, noKeyText}));
 }
 
 TEST_F(ElementCapabilitiesInstanceTest, ARefusalHasNoMessageWithoutABroker)

@@ -19,16 +19,16 @@ HandlerLines handler(const std::string& function)
     return {"SensorElementCapabilities", "SensorElementCapabilitiesProvider", function};
 }
 
-const HandlerLines Builder = handler("sensorElementCapabilitiesCMPIInstances");
-const Lines Built = builtFactory({"_createSensorMap", "_createEnabledLogicalElementCapMap"});
-const Lines BuiltWithoutSensors = builtFactory({"_createEnabledLogicalElementCapMap"});
-const Lines SensorPaths = operation("getAllSensorCMPIObjPaths");
-const Lines CapPaths = operation("getAllSensorEnabledLogicalElementCapCMPIObjPaths", 1041, 1093);
+const HandlerLines builder = handler("sensorElementCapabilitiesCMPIInstances");
+const Lines builtLines = builtFactory({"_createSensorMap", "_createEnabledLogicalElementCapMap"});
+const Lines builtWithoutSensors = builtFactory({"_createEnabledLogicalElementCapMap"});
+const Lines sensorPaths = operation("getAllSensorCMPIObjPaths");
+const Lines capPaths = operation("getAllSensorEnabledLogicalElementCapCMPIObjPaths", 1041, 1093);
 
 class ElementCapabilitiesTraceTest : public AssociationTest {
 protected:
     explicit ElementCapabilitiesTraceTest(
-        const std::vector<ScriptedNode>& nodes = {ThreeSensors[0], ThreeSensors[1]})
+        const std::vector<ScriptedNode>& nodes = {threeSensors[0], threeSensors[1]})
         : AssociationTest(SensorElementCapabilitiesProvider_Create_InstanceMI,
               SensorElementCapabilitiesProvider_Create_AssociationMI, nodes, {})
     {
@@ -48,8 +48,8 @@ TEST_F(ElementCapabilitiesTraceTest, OfEnumeratedNames)
     const HandlerLines lines = handler("SensorElementCapabilities_EnumInstanceNames");
     const Host::ObjectPath& ref = path(Class);
     EXPECT_THAT(traceOf([&] { enumerateNames(ref); }),
-        ElementsAreArray(sequence(
-            {lines.entry(), Built, counted(), SensorPaths, CapPaths, CapPaths, lines.exit()})));
+        ElementsAreArray(sequence({lines.entry(), builtLines, counted(), sensorPaths, capPaths,
+            capPaths, lines.exit()})));
 }
 
 TEST_F(ElementCapabilitiesEmptyTraceTest, OfNamesWithoutSensors)
@@ -58,7 +58,7 @@ TEST_F(ElementCapabilitiesEmptyTraceTest, OfNamesWithoutSensors)
     const Host::ObjectPath& ref = path(Class);
     EXPECT_THAT(traceOf([&] { enumerateNames(ref); }),
         ElementsAreArray(
-            sequence({lines.entry(), BuiltWithoutSensors, counted(), SensorPaths, lines.exit()})));
+            sequence({lines.entry(), builtWithoutSensors, counted(), sensorPaths, lines.exit()})));
 }
 
 TEST_F(ElementCapabilitiesTraceTest, OfEnumeratedInstances)
@@ -66,8 +66,8 @@ TEST_F(ElementCapabilitiesTraceTest, OfEnumeratedInstances)
     const HandlerLines lines = handler("SensorElementCapabilities_EnumInstances");
     const Host::ObjectPath& ref = path(Class);
     EXPECT_THAT(traceOf([&] { enumerate(ref); }),
-        ElementsAreArray(sequence({lines.entry(), Builder.entry(), Built, counted(), counted(),
-            SensorPaths, CapPaths, CapPaths, Builder.exit(), lines.exit()})));
+        ElementsAreArray(sequence({lines.entry(), builder.entry(), builtLines, counted(), counted(),
+            sensorPaths, capPaths, capPaths, builder.exit(), lines.exit()})));
 }
 
 TEST_F(ElementCapabilitiesEmptyTraceTest, OfInstancesWithoutSensors)
@@ -75,9 +75,9 @@ TEST_F(ElementCapabilitiesEmptyTraceTest, OfInstancesWithoutSensors)
     const HandlerLines lines = handler("SensorElementCapabilities_EnumInstances");
     const Host::ObjectPath& ref = path(Class);
     EXPECT_THAT(traceOf([&] { enumerate(ref); }),
-        ElementsAreArray(sequence({lines.entry(), Builder.entry(), BuiltWithoutSensors, counted(),
-            counted(), SensorPaths, Builder.failure("getAllSensorCMPIObjPaths failed"),
-            Builder.exit(), lines.exit()})));
+        ElementsAreArray(sequence({lines.entry(), builder.entry(), builtWithoutSensors, counted(),
+            counted(), sensorPaths, builder.failure("getAllSensorCMPIObjPaths failed"),
+            builder.exit(), lines.exit()})));
 }
 
 TEST_F(ElementCapabilitiesTraceTest, OfAnInstanceSearched)
@@ -85,8 +85,8 @@ TEST_F(ElementCapabilitiesTraceTest, OfAnInstanceSearched)
     const HandlerLines lines = handler("SensorElementCapabilities_GetInstance");
     const Host::ObjectPath& ref = path(Class, {{"Other", "x"}});
     EXPECT_THAT(traceOf([&] { get(ref); }),
-        ElementsAreArray(sequence({lines.entry(), Builder.entry(), Built, counted(), counted(),
-            SensorPaths, CapPaths, CapPaths, Builder.exit(), lines.exit()})));
+        ElementsAreArray(sequence({lines.entry(), builder.entry(), builtLines, counted(), counted(),
+            sensorPaths, capPaths, capPaths, builder.exit(), lines.exit()})));
 }
 
 TEST_F(ElementCapabilitiesTraceTest, OfARequestWithoutKeysHasNoFactory)
@@ -106,9 +106,10 @@ TEST_F(ElementCapabilitiesTraceTest, OfTheAssociatorsOfCapabilities)
     const Host::ObjectPath& source = capabilities();
     const Lines instance = operation("makeSensorInstance", 269, 737);
     EXPECT_THAT(traceOf([&] { associators(source, {.resultClass = "Result"}); }),
-        ElementsAreArray(sequence({lines.entry(), Built, counted(), lookedUp(Class, "Result", 1252),
-            around(operation("getAllSensorCMPIInstances"), sequence({instance, instance})),
-            lines.exit()})));
+        ElementsAreArray(
+            sequence({lines.entry(), builtLines, counted(), lookedUp(Class, "Result", 1252),
+                around(operation("getAllSensorCMPIInstances"), sequence({instance, instance})),
+                lines.exit()})));
 }
 
 TEST_F(ElementCapabilitiesTraceTest, OfTheAssociatorsOfASensor)
@@ -116,10 +117,11 @@ TEST_F(ElementCapabilitiesTraceTest, OfTheAssociatorsOfASensor)
     const HandlerLines lines = handler("SensorElementCapabilities_Associators");
     const Host::ObjectPath& source = sensor("B:/2");
     EXPECT_THAT(traceOf([&] { associators(source, {.associationClass = Class}); }),
-        ElementsAreArray(sequence({lines.entry(), Built, counted(), lookedUp(Class, "(null)", 1236),
-            around(operation("getAllSensorEnabledLogicalElementCapCMPIInstances", 996, 1017),
-                operation("makeSensorEnabledLogicalElementCapInstance", 863, 965)),
-            lines.exit()})));
+        ElementsAreArray(
+            sequence({lines.entry(), builtLines, counted(), lookedUp(Class, "(null)", 1236),
+                around(operation("getAllSensorEnabledLogicalElementCapCMPIInstances", 996, 1017),
+                    operation("makeSensorEnabledLogicalElementCapInstance", 863, 965)),
+                lines.exit()})));
 }
 
 TEST_F(ElementCapabilitiesTraceTest, OfTheNamesOfAssociators)
@@ -127,8 +129,8 @@ TEST_F(ElementCapabilitiesTraceTest, OfTheNamesOfAssociators)
     const HandlerLines lines = handler("SensorElementCapabilities_AssociatorNames");
     const Host::ObjectPath& source = sensor("B:/2");
     EXPECT_THAT(traceOf([&] { associatorNames(source, {.resultClass = "Result"}); }),
-        ElementsAreArray(sequence({lines.entry(), Built, counted(), lookedUp(Class, "Result", 1236),
-            CapPaths, lines.exit()})));
+        ElementsAreArray(sequence({lines.entry(), builtLines, counted(),
+            lookedUp(Class, "Result", 1236), capPaths, lines.exit()})));
 }
 
 TEST_F(ElementCapabilitiesTraceTest, OfATargetThatNobodyHereLeadsTo)
@@ -138,7 +140,7 @@ TEST_F(ElementCapabilitiesTraceTest, OfATargetThatNobodyHereLeadsTo)
     const auto expected = [&](const std::string& function) {
         const HandlerLines lines = handler(function);
         return sequence(
-            {lines.entry(), Built, counted(), lookedUp(other, "(null)", 1221), lines.exit()});
+            {lines.entry(), builtLines, counted(), lookedUp(other, "(null)", 1221), lines.exit()});
     };
     EXPECT_THAT(traceOf([&] { associators(source, {.associationClass = other}); }),
         ElementsAreArray(expected("SensorElementCapabilities_Associators")));
@@ -152,11 +154,11 @@ TEST_F(ElementCapabilitiesTraceTest, OfReferences)
     const HandlerLines names = handler("SensorElementCapabilities_ReferenceNames");
     const Host::ObjectPath& source = capabilities();
     EXPECT_THAT(traceOf([&] { references(source, {.resultClass = "not passed on"}); }),
-        ElementsAreArray(sequence({instances.entry(), Built, counted(),
-            lookedUp(Class, "(null)", 1252), SensorPaths, instances.exit()})));
+        ElementsAreArray(sequence({instances.entry(), builtLines, counted(),
+            lookedUp(Class, "(null)", 1252), sensorPaths, instances.exit()})));
     EXPECT_THAT(traceOf([&] { referenceNames(source, {.resultClass = "not passed on"}); }),
-        ElementsAreArray(sequence({names.entry(), Built, counted(), lookedUp(Class, "(null)", 1252),
-            SensorPaths, names.exit()})));
+        ElementsAreArray(sequence({names.entry(), builtLines, counted(),
+            lookedUp(Class, "(null)", 1252), sensorPaths, names.exit()})));
 }
 
 TEST_F(ElementCapabilitiesEmptyTraceTest, OfSensorsThatAreNotThere)
@@ -165,8 +167,8 @@ TEST_F(ElementCapabilitiesEmptyTraceTest, OfSensorsThatAreNotThere)
     const auto expected = [](const std::string& function) {
         const HandlerLines lines = handler(function);
         return sequence(
-            {lines.entry(), BuiltWithoutSensors, counted(), lookedUp(Class, "(null)", 1252),
-                SensorPaths, lines.failure("getAllSensorCMPIObjPaths failed"), lines.exit()});
+            {lines.entry(), builtWithoutSensors, counted(), lookedUp(Class, "(null)", 1252),
+                sensorPaths, lines.failure("getAllSensorCMPIObjPaths failed"), lines.exit()});
     };
     EXPECT_THAT(traceOf([&] { associatorNames(source); }),
         ElementsAreArray(expected("SensorElementCapabilities_AssociatorNames")));
@@ -181,7 +183,7 @@ TEST_F(ElementCapabilitiesTraceTest, OfASourceWithoutTarget)
     const Host::ObjectPath& source = system("host");
     const auto expected = [](const std::string& request, const std::string& text) {
         const HandlerLines lines = handler("SensorElementCapabilities_" + request);
-        return sequence({lines.entry(), Built, counted(), lookedUp(Class, "(null)", 1259),
+        return sequence({lines.entry(), builtLines, counted(), lookedUp(Class, "(null)", 1259),
             lines.failure("Object Path is NULL in " + text), lines.exit()});
     };
     EXPECT_THAT(traceOf([&] { associators(source); }),

@@ -19,7 +19,7 @@ struct Entry {
 using InstanceEntry = Entry<Testing::InstanceFactory>;
 using AssociationEntry = Entry<Testing::AssociationFactory>;
 
-const InstanceEntry InstanceEntries[] = {
+const InstanceEntry instanceEntries[] = {
     {"instanceSensorProfileProvider", SensorProfileProvider_Create_InstanceMI},
     {"instanceSensorEnabledLogicalElementCapabilitiesProvider",
         SensorEnabledLogicalElementCapabilitiesProvider_Create_InstanceMI},
@@ -28,20 +28,20 @@ const InstanceEntry InstanceEntries[] = {
     {"instanceSensorSystemDeviceProvider", SensorSystemDeviceProvider_Create_InstanceMI},
 };
 
-const AssociationEntry AssociationEntries[] = {
+const AssociationEntry associationEntries[] = {
     {"associationSensorElementCapabilitiesProvider",
         SensorElementCapabilitiesProvider_Create_AssociationMI},
     {"associationSensorSystemDeviceProvider", SensorSystemDeviceProvider_Create_AssociationMI},
 };
 
-const CMPIBroker NoBroker = {};
+const CMPIBroker noBroker = {};
 
 template <typename EntryType>
 class EntryTest : public ::testing::TestWithParam<EntryType> {
 protected:
     auto* create(CMPIStatus* status = nullptr) const
     {
-        return this->GetParam().factory(&NoBroker, nullptr, status);
+        return this->GetParam().factory(&noBroker, nullptr, status);
     }
 };
 
@@ -55,8 +55,8 @@ using InstanceEntryTest = EntryTest<InstanceEntry>;
 using AssociationEntryTest = EntryTest<AssociationEntry>;
 
 INSTANTIATE_TEST_SUITE_P(
-    All, InstanceEntryTest, ::testing::ValuesIn(InstanceEntries), entryName<InstanceEntry>);
-INSTANTIATE_TEST_SUITE_P(All, AssociationEntryTest, ::testing::ValuesIn(AssociationEntries),
+    All, InstanceEntryTest, ::testing::ValuesIn(instanceEntries), entryName<InstanceEntry>);
+INSTANTIATE_TEST_SUITE_P(All, AssociationEntryTest, ::testing::ValuesIn(associationEntries),
     entryName<AssociationEntry>);
 
 TEST_P(InstanceEntryTest, TheTableHasItsVersionsNameAndHandlers)
@@ -89,7 +89,7 @@ template <typename EntryType>
 void expectTheSameRecordAtEveryCall(const EntryType& entry)
 {
     const CMPIBroker other = {};
-    auto* const first = entry.factory(&NoBroker, nullptr, nullptr);
+    auto* const first = entry.factory(&noBroker, nullptr, nullptr);
     EXPECT_NE(first, nullptr);
     EXPECT_EQ(entry.factory(&other, nullptr, nullptr), first);
 }
@@ -108,7 +108,7 @@ template <typename EntryType>
 void expectAnUntouchedStatus(const EntryType& entry)
 {
     CMPIStatus status = {CMPI_RC_ERR_ACCESS_DENIED, nullptr};
-    entry.factory(&NoBroker, nullptr, &status);
+    entry.factory(&noBroker, nullptr, &status);
     EXPECT_EQ(status.rc, CMPI_RC_ERR_ACCESS_DENIED);
 }
 

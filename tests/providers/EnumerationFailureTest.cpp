@@ -16,8 +16,8 @@ using namespace Testing;
 using Vorn::NodeReading;
 using Vorn::NodeLexicon::NodeType;
 
-const char* const SensorsFailed = "getAllSensorCMPIInstances failed";
-const char* const CapabilitiesFailed = "getAllSensorEnabledLogicalElementCapCMPIInstances failed";
+const char* const sensorsFailed = "getAllSensorCMPIInstances failed";
+const char* const capabilitiesFailed = "getAllSensorEnabledLogicalElementCapCMPIInstances failed";
 
 class EnumerationFailureTest : public ProviderTest {
 protected:
@@ -39,7 +39,7 @@ protected:
     // Expects an open result and the status that the factory set.
     void expectGivenUp() const
     {
-        EXPECT_EQ(status_.rc, FailedEnumeration);
+        EXPECT_EQ(status_.rc, failedEnumeration);
         EXPECT_EQ(status_.msg, nullptr);
         EXPECT_TRUE(answer_.instances().empty());
         EXPECT_EQ(answer_.refused(), 0U);
@@ -71,7 +71,7 @@ TEST_F(EnumerationFailureTest, EndsAnEnumerationOfSensors)
     const HandlerLines lines = sensorHandler("EnumInstances");
     EXPECT_THAT(traceOfEnumeration(sensors_),
         ElementsAreArray(sequence({lines.entry(136), builtFactory({"_createSensorMap"}), counted(),
-            lines.failure(SensorsFailed, 155), lines.exit(157)})));
+            lines.failure(sensorsFailed, 155), lines.exit(157)})));
     expectGivenUp();
 }
 
@@ -80,7 +80,7 @@ TEST_F(EnumerationFailureTest, EndsTheSearchForASensor)
     const HandlerLines lines = sensorHandler("GetInstance");
     EXPECT_THAT(traceOfSearch(sensors_),
         ElementsAreArray(sequence({lines.entry(192), builtFactory({"_createSensorMap"}), counted(),
-            lines.failure(SensorsFailed, 251), lines.exit(253)})));
+            lines.failure(sensorsFailed, 251), lines.exit(253)})));
     expectGivenUp();
 }
 
@@ -90,7 +90,7 @@ TEST_F(EnumerationFailureTest, EndsAnEnumerationOfCapabilities)
     EXPECT_THAT(traceOfEnumeration(capabilities_),
         ElementsAreArray(
             sequence({lines.entry(137), builtFactory({"_createEnabledLogicalElementCapMap"}),
-                lines.failure(CapabilitiesFailed, 153), lines.exit(155)})));
+                lines.failure(capabilitiesFailed, 153), lines.exit(155)})));
     expectGivenUp();
 }
 
@@ -99,7 +99,7 @@ TEST_F(EnumerationFailureTest, EndsTheSearchForCapabilities)
     const HandlerLines lines = capabilitiesHandler("GetInstance");
     EXPECT_THAT(traceOfSearch(capabilities_),
         ElementsAreArray(sequence({lines.entry(191), builtFactory({"_createSensorMap"}),
-            lines.failure(CapabilitiesFailed, 243), lines.exit(245)})));
+            lines.failure(capabilitiesFailed, 243), lines.exit(245)})));
     expectGivenUp();
 }
 
@@ -108,7 +108,7 @@ TEST_F(EnumerationFailureTest, EndsTheSearchForCapabilities)
 class FailingAssociationTest : public AssociationTest {
 protected:
     FailingAssociationTest(InstanceFactory instances, AssociationFactory associations)
-        : AssociationTest(instances, associations, {ThreeSensors[0]}, {"host"})
+        : AssociationTest(instances, associations, {threeSensors[0]}, {"host"})
     {
     }
 
@@ -118,8 +118,8 @@ protected:
         CMPIStatus status = {CMPI_RC_OK, nullptr};
         EXPECT_THAT(ownLines(traceOf([&] { status = associators(source); })),
             ElementsAreArray(
-                sequence({handler.entry(), handler.failure(SensorsFailed), handler.exit()})));
-        EXPECT_EQ(status.rc, FailedEnumeration);
+                sequence({handler.entry(), handler.failure(sensorsFailed), handler.exit()})));
+        EXPECT_EQ(status.rc, failedEnumeration);
         expectNothing(false);
     }
 };
@@ -156,12 +156,12 @@ TEST_F(FailingSystemDeviceTest, EndsTheAssociatorsOfASystem)
                                       "SensorSystemDevice_Associators"});
 }
 
-const auto AllPairsInOrder = ::testing::ElementsAre("A 1", "A 2", "B 1", "B 2");
+const auto allPairsInOrder = ::testing::ElementsAre("A 1", "A 2", "B 1", "B 2");
 
 TEST_F(FailingElementCapabilitiesTest, NamesAreOrderedByCapabilitiesInsideSensors)
 {
     expectOk(enumerateNames(path("ZUMLO_SensorElementCapabilities")));
-    EXPECT_THAT(pairs("ManagedElement", "Capabilities"), AllPairsInOrder);
+    EXPECT_THAT(pairs("ManagedElement", "Capabilities"), allPairsInOrder);
 }
 
 TEST_F(FailingElementCapabilitiesTest, NamesWithoutCapabilitiesEndWithoutAnExitMarkInAnOpenResult)
@@ -183,7 +183,7 @@ TEST_F(FailingElementCapabilitiesTest, NamesWithoutCapabilitiesEndWithoutAnExitM
 TEST_F(FailingElementCapabilitiesTest, InstancesAreOrderedByCapabilitiesInsideSensors)
 {
     expectOk(enumerate(path("ZUMLO_SensorElementCapabilities")));
-    EXPECT_THAT(pairs("ManagedElement", "Capabilities"), AllPairsInOrder);
+    EXPECT_THAT(pairs("ManagedElement", "Capabilities"), allPairsInOrder);
 }
 
 } // namespace EnumerationFailureTests

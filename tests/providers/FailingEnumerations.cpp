@@ -18,7 +18,7 @@ namespace {
 int fail(std::vector<CMPIInstance*>& instances, CMPIStatus* rc)
 {
     instances.push_back(nullptr); // not to be returned to the client
-    *rc = {Testing::FailedEnumeration, nullptr};
+    *rc = {Testing::failedEnumeration, nullptr};
     return 1;
 }
 

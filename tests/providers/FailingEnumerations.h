@@ -7,7 +7,7 @@
 namespace Testing {
 
 // The code that failing enumerations set in the status.
-inline constexpr CMPIrc FailedEnumeration = CMPI_RC_ERR_ACCESS_DENIED;
+inline constexpr CMPIrc failedEnumeration = CMPI_RC_ERR_ACCESS_DENIED;
 
 // The result of the enumeration of the paths of capabilities, which adds no path when it is not 0.
 inline int capabilitiesPathsResult = 0;

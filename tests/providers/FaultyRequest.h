@@ -126,7 +126,7 @@ protected:
     }
 
     // The manners in which a call fails to return its object.
-    static constexpr FaultManner Undelivered[] = {FaultManner::nullResult, FaultManner::handleless};
+    static constexpr FaultManner undelivered[] = {FaultManner::nullResult, FaultManner::handleless};
 
     Host::Broker broker_;
     std::unique_ptr<FaultyBroker> faulty_;

@@ -13,8 +13,8 @@ using namespace Testing;
 using ::testing::ElementsAre;
 using ::testing::WithParamInterface;
 
-constexpr const char* NoKeyText = "At least one key should be passed";
-const std::vector<ScriptedNode> OneFan = {
+constexpr const char* noKeyText = "At least one key should be passed";
+const std::vector<ScriptedNode> oneFan = {
     {Vorn::NodeLexicon::NodeType::Tachometer, "/f", "Fan", Vorn::NodeReading{}}};
 
 struct ProviderCase {
@@ -26,7 +26,7 @@ struct ProviderCase {
     InstanceFactory create;
 };
 
-const ProviderCase Cases[] = {
+const ProviderCase cases[] = {
     {"Sensor", "ZUMLO_NumericSensor", "SensorProfileProvider", "DeviceID", "Fan:/f",
         SensorProfileProvider_Create_InstanceMI},
     {"Capabilities", "ZUMLO_SensorEnabledLogicalElementCapabilities",
@@ -44,7 +44,7 @@ std::string nameOfCase(const ::testing::TestParamInfo<ProviderCase>& info)
 
 class InstanceProviderTest : public InstanceRequestsTest, public WithParamInterface<ProviderCase> {
 protected:
-    InstanceProviderTest() : InstanceRequestsTest(GetParam().className, GetParam().create, OneFan)
+    InstanceProviderTest() : InstanceRequestsTest(GetParam().className, GetParam().create, oneFan)
     {
         broker_.setClassInformation(&profileClasses());
     }
@@ -67,14 +67,14 @@ protected:
     }
 };
 
-INSTANTIATE_TEST_SUITE_P(Each, InstanceProviderTest, ::testing::ValuesIn(Cases), nameOfCase);
+INSTANTIATE_TEST_SUITE_P(Each, InstanceProviderTest, ::testing::ValuesIn(cases), nameOfCase);
 
 TEST_P(InstanceProviderTest, APathWithoutKeysIsRefusedInAClosedResult)
 {
     const CMPIStatus status = get(path(className_));
     EXPECT_EQ(status.rc, CMPI_RC_ERR_FAILED);
-    EXPECT_EQ(textOf(status.msg), NoKeyText);
-    EXPECT_THAT(messages_, ElementsAre(BrokerMessage{2, GetParam().provider, NoKeyText}));
+    EXPECT_EQ(textOf(status.msg), noKeyText);
+    EXPECT_THAT(messages_, ElementsAre(BrokerMessage{2, GetParam().provider, noKeyText}));
     expectNothing(true);
 }
 
@@ -93,7 +93,7 @@ TEST_P(InstanceProviderTest, ARequestWithoutAPathIsRefused)
     const CMPIObjectPath handleless = {nullptr, &Host::ObjectPath::functions};
     const CMPIStatus status = mi_->ft->getInstance(mi_, context(), result(), &handleless, nullptr);
     EXPECT_EQ(status.rc, CMPI_RC_ERR_FAILED);
-    EXPECT_EQ(textOf(status.msg), NoKeyText);
+    EXPECT_EQ(textOf(status.msg), noKeyText);
 }
 
 TEST_P(InstanceProviderTest, AnUnknownKeyIsAnOpenEmptyAnswer)
@@ -169,10 +169,10 @@ protected:
     static RequestKind one() { return kinds().one("one", keyed(GetParam().key)); }
 
     const ScriptedMachine machine_{
-        {OneFan[0], {Vorn::NodeLexicon::NodeType::Temperature, "/t", "CPU", {}}}};
+        {oneFan[0], {Vorn::NodeLexicon::NodeType::Temperature, "/t", "CPU", {}}}};
 };
 
-INSTANTIATE_TEST_SUITE_P(Each, InstanceProviderFaultTest, ::testing::ValuesIn(Cases), nameOfCase);
+INSTANTIATE_TEST_SUITE_P(Each, InstanceProviderFaultTest, ::testing::ValuesIn(cases), nameOfCase);
 
 TEST_P(InstanceProviderFaultTest, EveryFaultOfEveryCallIsSurvivedAndNothingIsMadeUp)
 {
@@ -189,7 +189,7 @@ TEST_P(InstanceProviderFaultTest, EveryFaultOfEveryCallIsSurvivedAndNothingIsMad
 TEST_P(InstanceProviderFaultTest, AnInstanceThatCannotBeMadeIsPassedOnAsItIs)
 {
     for (const RequestKind& kind : {kinds().instances(keyless()), one()})
-        for (const FaultManner manner : Undelivered)
+        for (const FaultManner manner : undelivered)
             for (const BrokerCall call : {BrokerCall::newInstance, BrokerCall::newObjectPath}) {
                 const auto request = run(kind, {call, 1, manner, CMPI_RC_OK});
                 EXPECT_EQ(request->status.rc, CMPI_RC_OK);
@@ -201,7 +201,7 @@ TEST_P(InstanceProviderFaultTest, AnInstanceThatCannotBeMadeIsPassedOnAsItIs)
 
 TEST_P(InstanceProviderFaultTest, AKeyReportedMissingThroughTheStatusIsAbsentAndTheAnswerIsOk)
 {
-    for (const FaultManner manner : Undelivered) {
+    for (const FaultManner manner : undelivered) {
         const auto request =
             run(one(), {BrokerCall::getKey, 1, manner, CMPI_RC_ERR_NO_SUCH_PROPERTY});
         EXPECT_EQ(request->status.rc, CMPI_RC_OK);
@@ -215,7 +215,7 @@ TEST_P(InstanceProviderFaultTest, APathThatCannotCountItsKeysHasNone)
 {
     const auto request = run(one(), {BrokerCall::getKeyCount, 1, FaultManner::nullResult});
     EXPECT_EQ(request->status.rc, CMPI_RC_ERR_FAILED);
-    EXPECT_EQ(request->message(), NoKeyText);
+    EXPECT_EQ(request->message(), noKeyText);
     EXPECT_TRUE(request->answer.isDone());
 }
 

@@ -21,7 +21,7 @@ protected:
     {
     }
 
-    CMPIStatus enumerateNames(const char* nameSpace = NameSpace)
+    CMPIStatus enumerateNames(const char* nameSpace = testNameSpace)
     {
         return mi_->ft->enumerateInstanceNames(
             mi_, context(), result(), path(className_, {}, nameSpace).handle());

@@ -12,8 +12,8 @@ namespace ManySensorsTests {
 using namespace Testing;
 using ::testing::ElementsAre;
 
-constexpr const char* ElementCapabilities = "ZUMLO_SensorElementCapabilities";
-constexpr const char* SystemDevice = "ZUMLO_SensorSystemDevice";
+constexpr const char* elementCapabilities = "ZUMLO_SensorElementCapabilities";
+constexpr const char* systemDevice = "ZUMLO_SensorSystemDevice";
 
 // Returns sensors whose identifiers are in the order of their numbers.
 std::vector<ScriptedNode> sensors(std::size_t count)
@@ -66,7 +66,7 @@ protected:
 
     void getPair(const std::string& systemName, const std::string& deviceID)
     {
-        Host::ObjectPath& ref = path(SystemDevice);
+        Host::ObjectPath& ref = path(systemDevice);
         ref.addKey("GroupComponent", Host::Value::of(system(systemName)));
         ref.addKey("PartComponent", Host::Value::of(sensor(deviceID)));
         expectOk(get(ref));
@@ -76,13 +76,13 @@ protected:
 
 TEST_F(SystemDeviceOfManyPairsTest, AsManyInstancesAreEnumeratedAsTheCountSays)
 {
-    expectOk(enumerate(path(SystemDevice)));
+    expectOk(enumerate(path(systemDevice)));
     EXPECT_EQ(answer_.instances().size(), 256U);
 }
 
 TEST_F(SystemDeviceOfManyPairsTest, AllNamesAreEnumerated)
 {
-    expectOk(enumerateNames(path(SystemDevice)));
+    expectOk(enumerateNames(path(systemDevice)));
     EXPECT_EQ(answer_.paths().size(), 65792U);
 }
 
@@ -109,7 +109,7 @@ TEST_F(SystemDeviceOfManyPairsTest, ASensorHasAsManyReferencesAsTheCountOfItsSys
 
 TEST_F(ElementCapabilitiesOf65536SensorsTest, ThereAreNoPairs)
 {
-    expectOk(enumerateNames(path(ElementCapabilities)));
+    expectOk(enumerateNames(path(elementCapabilities)));
     expectNothing(true);
 }
 
@@ -119,7 +119,7 @@ TEST_F(ElementCapabilitiesOf65537SensorsTest, ThereIsOnePairAndOneFarEnd)
     EXPECT_THAT(delivered(), ElementsAre("F:/100000"));
     expectOk(referenceNames(capabilities()));
     EXPECT_EQ(answer_.paths().size(), 2U);
-    expectOk(enumerate(path(ElementCapabilities)));
+    expectOk(enumerate(path(elementCapabilities)));
     EXPECT_EQ(answer_.instances().size(), 1U);
 }
 
@@ -127,7 +127,7 @@ TEST_F(SystemDeviceOf65537SensorsTest, ThereIsOnePairForEachSystem)
 {
     expectOk(associatorNames(system("host")));
     EXPECT_THAT(delivered(), ElementsAre("F:/100000"));
-    expectOk(enumerate(path(SystemDevice)));
+    expectOk(enumerate(path(systemDevice)));
     EXPECT_EQ(answer_.instances().size(), 2U);
 }
 

@@ -22,13 +22,13 @@ struct Module {
     AssociationFactory associations; // null where the module has none
 };
 
-constexpr Module Sensors = {"Sensors", SensorProfileProvider_Create_InstanceMI, nullptr};
-constexpr Module Capabilities = {
+constexpr Module sensors = {"Sensors", SensorProfileProvider_Create_InstanceMI, nullptr};
+constexpr Module capabilitiesSource = {
     "Capabilities", SensorEnabledLogicalElementCapabilitiesProvider_Create_InstanceMI, nullptr};
-constexpr Module ElementCapabilities = {"ElementCapabilities",
+constexpr Module elementCapabilities = {"ElementCapabilities",
     SensorElementCapabilitiesProvider_Create_InstanceMI,
     SensorElementCapabilitiesProvider_Create_AssociationMI};
-constexpr Module SystemDevice = {"SystemDevice", SensorSystemDeviceProvider_Create_InstanceMI,
+constexpr Module systemDevice = {"SystemDevice", SensorSystemDeviceProvider_Create_InstanceMI,
     SensorSystemDeviceProvider_Create_AssociationMI};
 
 // Another handle of the embedded broker. Records the handles through which paths are made.
@@ -103,7 +103,7 @@ protected:
 constexpr auto moduleName = [](const auto& info) { return info.param.name; };
 
 INSTANTIATE_TEST_SUITE_P(EveryModule, ProviderLifeTest,
-    ::testing::Values(Sensors, Capabilities, ElementCapabilities, SystemDevice), moduleName);
+    ::testing::Values(sensors, capabilitiesSource, elementCapabilities, systemDevice), moduleName);
 
 TEST_P(ProviderLifeTest, ARequestAfterCleanupIsServedAsBefore)
 {
@@ -119,7 +119,7 @@ TEST_P(ProviderLifeTest, WritingAndQueryingTouchNoResultAndWriteNoLine)
     CMPIInstanceMI* const mi = GetParam().instances(broker(), nullptr, nullptr);
     const CMPIObjectPath* const ref = sensor();
     const CMPIInstance* const instance =
-        request_->makeInstance(request_->makePath(NameSpace, "ZUMLO_NumericSensor")).handle();
+        request_->makeInstance(request_->makePath(testNameSpace, "ZUMLO_NumericSensor")).handle();
     const LogCapture capture;
     mi->ft->createInstance(mi, context(), result(), ref, instance);
     mi->ft->modifyInstance(mi, context(), result(), ref, instance, nullptr);
@@ -134,7 +134,7 @@ TEST_P(ProviderLifeTest, WritingAndQueryingTouchNoResultAndWriteNoLine)
 class BothKindsTest : public ProviderLifeTest {};
 
 INSTANTIATE_TEST_SUITE_P(
-    BothModules, BothKindsTest, ::testing::Values(ElementCapabilities, SystemDevice), moduleName);
+    BothModules, BothKindsTest, ::testing::Values(elementCapabilities, systemDevice), moduleName);
 
 TEST_P(BothKindsTest, ARequestForAssociationsAfterCleanupIsServedAsBefore)
 {

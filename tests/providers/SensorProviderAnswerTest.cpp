@@ -21,7 +21,7 @@ using Vorn::NodeReading;
 using Vorn::NodeLexicon::NodeType;
 
 constexpr const char* Class = "ZUMLO_NumericSensor";
-const std::vector<ScriptedNode> ThreeSensors = {{NodeType::Temperature, "/t", "CPU", NodeReading{}},
+const std::vector<ScriptedNode> threeSensors = {{NodeType::Temperature, "/t", "CPU", NodeReading{}},
     {NodeType::Voltage, "/v", "Core", NodeReading{}},
     {NodeType::Tachometer, "/f", "Fan", NodeReading{}}};
 
@@ -67,7 +67,7 @@ class SearchTest : public SensorProviderAnswerTest {
 protected:
     void get(const std::string& deviceID, const char** properties = nullptr)
     {
-        const ScriptedMachine machine(ThreeSensors);
+        const ScriptedMachine machine(threeSensors);
         Testing::FaultyBroker faulty(broker_);
         CMPIInstanceMI* const mi =
             SensorProfileProvider_Create_InstanceMI(faulty.handle(), nullptr, nullptr);
@@ -113,7 +113,7 @@ TEST_F(SearchTest, NoInstanceIsFoundByThePathOfNone)
 
 TEST_F(SensorProviderAnswerTest, TheResultIsClosedBetweenTheMarks)
 {
-    const ScriptedMachine machine(ThreeSensors);
+    const ScriptedMachine machine(threeSensors);
     auto all = requests();
     CMPIInstanceMI* const mi = SensorProfileProvider_Create_InstanceMI(broker(), nullptr, nullptr);
     all.push_back([this, mi](const CMPIResult* into) { // a path without keys

@@ -15,7 +15,7 @@ using Vorn::NodeReading;
 using Vorn::NodeLexicon::NodeType;
 
 constexpr const char* Class = "ZUMLO_NumericSensor";
-const std::vector<ScriptedNode> TwoSensors = {{NodeType::Temperature, "/t", "CPU", NodeReading{}},
+const std::vector<ScriptedNode> twoSensors = {{NodeType::Temperature, "/t", "CPU", NodeReading{}},
     {NodeType::Tachometer, "/f", "Fan", NodeReading{}}};
 
 enum class Operation { names, instances, oneInstance, instanceByPath };
@@ -53,7 +53,7 @@ protected:
         return FaultTest::run(kindOf(operation, properties), fault);
     }
 
-    ScriptedMachine machine_{TwoSensors};
+    ScriptedMachine machine_{twoSensors};
 };
 
 // ---- Paths ----
@@ -106,10 +106,10 @@ TEST_P(PathFailureTest, AnInstanceWhosePathIsNotToldEqualsNothing)
 
 // ---- Arrays, in the order in which an instance needs them ----
 
-constexpr unsigned PossibleStates = 1;
-constexpr unsigned SupportedThresholds = 2;
-constexpr unsigned SettableThresholds = 3;
-constexpr unsigned OperationalStatus = 4;
+constexpr unsigned possibleStates = 1;
+constexpr unsigned supportedThresholds = 2;
+constexpr unsigned settableThresholds = 3;
+constexpr unsigned operationalStatus = 4;
 
 class ArrayFailureTest : public SensorProviderFaultTest,
                          public ::testing::WithParamInterface<FaultManner> {
@@ -142,7 +142,7 @@ INSTANTIATE_TEST_SUITE_P(NullOrHandleless, ArrayFailureTest,
 TEST_P(ArrayFailureTest, WithoutPossibleStatesTheBuildGoesOn)
 {
     const LogCapture capture;
-    const auto request = runWithout(PossibleStates);
+    const auto request = runWithout(possibleStates);
     EXPECT_EQ(request->status.rc, CMPI_RC_OK);
     ASSERT_EQ(request->answer.instances().size(), 1U);
     EXPECT_EQ(property(*request->answer.instances()[0], "PossibleStates"), "absent");
@@ -161,7 +161,7 @@ TEST_P(ArrayFailureTest, WithoutPossibleStatesTheBuildGoesOn)
 TEST_P(ArrayFailureTest, WithoutSupportedThresholdsTheBuildEndsWithoutItsExitingLine)
 {
     const LogCapture capture;
-    const auto request = runWithout(SupportedThresholds);
+    const auto request = runWithout(supportedThresholds);
     const std::string text =
         "Create Array for Property" + std::string(25, ' ') + "SupportedThresholds failed.";
     expectReport(*request, text, text);
@@ -172,7 +172,7 @@ TEST_P(ArrayFailureTest, WithoutSupportedThresholdsTheBuildEndsWithoutItsExiting
 TEST_P(ArrayFailureTest, WithoutSettableThresholdsTheBuildEndsWithoutItsExitingLine)
 {
     const LogCapture capture;
-    const auto request = runWithout(SettableThresholds);
+    const auto request = runWithout(settableThresholds);
     const std::string text =
         "Create Array for Property" + std::string(25, ' ') + "SettableThresholds failed.";
     expectReport(*request, text, text);
@@ -183,7 +183,7 @@ TEST_P(ArrayFailureTest, WithoutSettableThresholdsTheBuildEndsWithoutItsExitingL
 TEST_P(ArrayFailureTest, WithoutOperationalStatusTheBuildEndsWithAnExitingLineOfItsOwn)
 {
     const LogCapture capture;
-    const auto request = runWithout(OperationalStatus);
+    const auto request = runWithout(operationalStatus);
     expectReport(*request,
         "Create Array for Property" + std::string(25, ' ') + "OperationalStatus failed.",
         "Create Array for Property Operat" + std::string(24, ' ') + "ionalStatus failed.");
@@ -194,7 +194,7 @@ TEST_P(ArrayFailureTest, WithoutOperationalStatusTheBuildEndsWithAnExitingLineOf
 TEST_P(ArrayFailureTest, InAnEnumerationLeavesTheOtherInstancesWhole)
 {
     const auto request = run(
-        Operation::instances, {BrokerCall::newArray, SupportedThresholds, GetParam(), CMPI_RC_OK});
+        Operation::instances, {BrokerCall::newArray, supportedThresholds, GetParam(), CMPI_RC_OK});
     EXPECT_EQ(request->messages.size(), 1U);
     ASSERT_EQ(request->answer.instances().size(), 2U);
     EXPECT_EQ(property(*request->answer.instances()[0], "SupportedThresholds"), "absent");
@@ -206,7 +206,7 @@ TEST_F(SensorProviderFaultTest, TheStatusThatTheBrokerLeftIsReturned)
 {
     const char* properties[] = {"PossibleStates", nullptr};
     const auto request = run(Operation::oneInstance,
-        {BrokerCall::newArray, PossibleStates, FaultManner::nullResult, CMPI_RC_ERR_ACCESS_DENIED},
+        {BrokerCall::newArray, possibleStates, FaultManner::nullResult, CMPI_RC_ERR_ACCESS_DENIED},
         properties);
     EXPECT_EQ(request->status.rc, CMPI_RC_ERR_ACCESS_DENIED);
     EXPECT_EQ(request->status.msg, nullptr);

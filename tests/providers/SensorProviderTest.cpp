@@ -14,15 +14,15 @@ using Vorn::NodeReading;
 using Vorn::NodeLexicon::NodeType;
 
 constexpr const char* Class = "ZUMLO_NumericSensor";
-constexpr const char* NoKeyText = "At least one key should be passed";
+constexpr const char* noKeyText = "At least one key should be passed";
 
-const std::vector<ScriptedNode> Machine = {{NodeType::Temperature, "/p/b", "CPU", NodeReading{}},
+const std::vector<ScriptedNode> machine = {{NodeType::Temperature, "/p/b", "CPU", NodeReading{}},
     {NodeType::Temperature, "/p/a", "CPU", NodeReading{}},
     {NodeType::Tachometer, "/p", "Fan", NodeReading{}}};
 
 class SensorProviderTest : public InstanceRequestsTest {
 protected:
-    explicit SensorProviderTest(const std::vector<ScriptedNode>& nodes = Machine)
+    explicit SensorProviderTest(const std::vector<ScriptedNode>& nodes = machine)
         : InstanceRequestsTest(Class, SensorProfileProvider_Create_InstanceMI, nodes)
     {
     }

@@ -56,72 +56,72 @@ protected:
     CMPIInstanceMI* mi_;
 };
 
-const std::vector<ScriptedNode> OneFan = {{NodeType::Tachometer, "/f", "Fan", NodeReading{}}};
+const std::vector<ScriptedNode> oneFan = {{NodeType::Tachometer, "/f", "Fan", NodeReading{}}};
 
 HandlerLines handlerOf(const std::string& request)
 {
     return {"SensorProfileProvider", "SensorProvider", "Sensor_" + request};
 }
 
-const Lines BuiltFactory = builtFactory({"_createSensorMap"});
-const Lines EmptyFactory = builtFactory({});
-const Lines Paths = operation("getAllSensorCMPIObjPaths");
-const Lines OneInstance = operation("makeSensorInstance", 269, 737);
+const Lines builtFactoryLines = builtFactory({"_createSensorMap"});
+const Lines emptyFactoryLines = builtFactory({});
+const Lines pathLines = operation("getAllSensorCMPIObjPaths");
+const Lines oneInstance = operation("makeSensorInstance", 269, 737);
 
 TEST_F(SensorProviderTraceTest, OfEnumeratedNames)
 {
     const HandlerLines lines = handlerOf("EnumInstanceNames");
-    EXPECT_THAT(traceOf(OneFan, {}, enumerateNames),
+    EXPECT_THAT(traceOf(oneFan, {}, enumerateNames),
         ElementsAreArray(
-            sequence({lines.entry(74), BuiltFactory, counted(), Paths, lines.exit(114)})));
+            sequence({lines.entry(74), builtFactoryLines, counted(), pathLines, lines.exit(114)})));
 }
 
 TEST_F(SensorProviderTraceTest, OfEnumeratedNamesWithoutSensors)
 {
     const HandlerLines lines = handlerOf("EnumInstanceNames");
     EXPECT_THAT(traceOf({}, {}, enumerateNames),
-        ElementsAreArray(sequence({lines.entry(74), EmptyFactory, counted(), Paths,
+        ElementsAreArray(sequence({lines.entry(74), emptyFactoryLines, counted(), pathLines,
             lines.failure("getAllSensorCMPIObjPaths failed", 94), lines.exit(96)})));
 }
 
 TEST_F(SensorProviderTraceTest, OfEnumeratedInstances)
 {
     const HandlerLines lines = handlerOf("EnumInstances");
-    EXPECT_THAT(traceOf(OneFan, {}, enumerate),
-        ElementsAreArray(sequence({lines.entry(136), BuiltFactory, counted(),
-            around(operation("getAllSensorCMPIInstances"), OneInstance), lines.exit(170)})));
+    EXPECT_THAT(traceOf(oneFan, {}, enumerate),
+        ElementsAreArray(sequence({lines.entry(136), builtFactoryLines, counted(),
+            around(operation("getAllSensorCMPIInstances"), oneInstance), lines.exit(170)})));
 }
 
 TEST_F(SensorProviderTraceTest, OfAnInstanceFound)
 {
     const HandlerLines lines = handlerOf("GetInstance");
-    EXPECT_THAT(traceOf(OneFan, {{"DeviceID", "Fan:/f"}}, get),
-        ElementsAreArray(sequence({lines.entry(192), BuiltFactory, counted(),
-            around(operation("getOneSensorCMPIInstance"), OneInstance), lines.exit(293)})));
+    EXPECT_THAT(traceOf(oneFan, {{"DeviceID", "Fan:/f"}}, get),
+        ElementsAreArray(sequence({lines.entry(192), builtFactoryLines, counted(),
+            around(operation("getOneSensorCMPIInstance"), oneInstance), lines.exit(293)})));
 }
 
 TEST_F(SensorProviderTraceTest, OfAnInstanceNotFound)
 {
     const HandlerLines lines = handlerOf("GetInstance");
-    EXPECT_THAT(traceOf(OneFan, {{"DeviceID", "other"}}, get),
+    EXPECT_THAT(traceOf(oneFan, {{"DeviceID", "other"}}, get),
         ElementsAreArray(sequence(
-            {lines.entry(192), BuiltFactory, counted(), brokenOff("getOneSensorCMPIInstance"),
+            {lines.entry(192), builtFactoryLines, counted(), brokenOff("getOneSensorCMPIInstance"),
                 lines.failure("getOneSensorCMPIInstance failed", 220), lines.exit(222)})));
 }
 
 TEST_F(SensorProviderTraceTest, OfAnInstanceSearchedByItsPath)
 {
     const HandlerLines lines = handlerOf("GetInstance");
-    EXPECT_THAT(traceOf(OneFan, {{"Other", "x"}}, get),
-        ElementsAreArray(sequence({lines.entry(192), BuiltFactory, counted(),
-            around(operation("getAllSensorCMPIInstances"), OneInstance), lines.exit(293)})));
+    EXPECT_THAT(traceOf(oneFan, {{"Other", "x"}}, get),
+        ElementsAreArray(sequence({lines.entry(192), builtFactoryLines, counted(),
+            around(operation("getAllSensorCMPIInstances"), oneInstance), lines.exit(293)})));
 }
 
 TEST_F(SensorProviderTraceTest, OfARequestWithoutKeysHasNoFactory)
 {
     const HandlerLines lines = handlerOf("GetInstance");
     EXPECT_THAT(
-        traceOf(OneFan, {}, get), ElementsAreArray(sequence({lines.entry(192), lines.exit(293)})));
+        traceOf(oneFan, {}, get), ElementsAreArray(sequence({lines.entry(192), lines.exit(293)})));
 }
 
 TEST_F(SensorProviderTraceTest, BracketLinesStandInTheTraceHeader)

@@ -18,12 +18,13 @@ class SystemDeviceFaultSweepTest : public SystemDeviceFaultTest,
                                    public ::testing::WithParamInterface<RequestKind> {};
 
 INSTANTIATE_TEST_SUITE_P(Instances, SystemDeviceFaultSweepTest,
-    ::testing::Values(Names, Instances, OneInstance, Kinds.one("instanceWithoutKeys", Keyless)),
+    ::testing::Values(
+        nameRequest, instanceRequest, oneInstance, kinds.one("instanceWithoutKeys", keylessSource)),
     ::testing::PrintToStringParamName());
-INSTANTIATE_TEST_SUITE_P(FromSensor, SystemDeviceFaultSweepTest, ::testing::ValuesIn(FromSensor),
-    ::testing::PrintToStringParamName());
-INSTANTIATE_TEST_SUITE_P(FromSystem, SystemDeviceFaultSweepTest, ::testing::ValuesIn(FromSystem),
-    ::testing::PrintToStringParamName());
+INSTANTIATE_TEST_SUITE_P(FromSensor, SystemDeviceFaultSweepTest,
+    ::testing::ValuesIn(requestsFromSensor), ::testing::PrintToStringParamName());
+INSTANTIATE_TEST_SUITE_P(FromSystem, SystemDeviceFaultSweepTest,
+    ::testing::ValuesIn(requestsFromSystem), ::testing::PrintToStringParamName());
 
 TEST_P(SystemDeviceFaultSweepTest, IsSurvivedAndAnswersWithNothingMadeUp)
 {
@@ -42,8 +43,8 @@ class SystemDeviceAssociationFaultTest : public SystemDeviceFaultTest {};
 
 TEST_F(SystemDeviceAssociationFaultTest, ATargetThatCannotBeMadeIsNoTarget)
 {
-    for (const FaultManner manner : Undelivered)
-        for (const auto& kinds : {FromSensor, FromSystem})
+    for (const FaultManner manner : undelivered)
+        for (const auto& kinds : {requestsFromSensor, requestsFromSystem})
             for (const Which which : {Associators, AssociatorNames, References, ReferenceNames}) {
                 const auto request = run(kinds[which], {BrokerCall::newObjectPath, 1, manner});
                 EXPECT_EQ(countOf(*request), 0U);
@@ -53,20 +54,20 @@ TEST_F(SystemDeviceAssociationFaultTest, ATargetThatCannotBeMadeIsNoTarget)
                     EXPECT_EQ(request->status.msg, nullptr);
                     continue;
                 }
-                const std::string text = "Object Path is NULL in " + Requests[which] + ".";
+                const std::string text = "Object Path is NULL in " + requests[which] + ".";
                 EXPECT_EQ(request->status.rc, CMPI_RC_ERR_FAILED);
                 EXPECT_EQ(request->message(), text);
-                EXPECT_EQ(request->lastMessage(), (BrokerMessage{2, Provider, text}));
+                EXPECT_EQ(request->lastMessage(), (BrokerMessage{2, provider, text}));
             }
 }
 
 // The broker may report a failure for the last text that the provider reads.
 TEST_F(SystemDeviceAssociationFaultTest, AResultClassThatIsNotServedIsAnsweredWithOk)
 {
-    for (const SourceMaker& source : {Sensor, System}) {
+    for (const SourceMaker& source : {sensorSource, systemSource}) {
         const RequestKind kind = {
             "", source, [](auto* broker, auto* context, auto* result, auto* path) {
-                CMPIAssociationMI* const mi = Kinds.associationFactory(broker, nullptr, nullptr);
+                CMPIAssociationMI* const mi = kinds.associationFactory(broker, nullptr, nullptr);
                 return mi->ft->associatorNames(
                     mi, context, result, path, Class, "CIM_LogicalDevice", nullptr, nullptr);
             }};
@@ -88,11 +89,11 @@ TEST_F(SystemDeviceAssociationFaultTest, SensorPathsThatCannotBeMadeEndInTheFact
     for (const Which which : {AssociatorNames, References, ReferenceNames}) {
         const unsigned nth = which == AssociatorNames ? 2 : 3;
         const Fault fault = {BrokerCall::newObjectPath, nth, FaultManner::nullResult};
-        const auto [request, lines] = runTraced(FromSystem[which], fault);
+        const auto [request, lines] = runTraced(requestsFromSystem[which], fault);
         EXPECT_EQ(request->status.rc, CMPI_RC_ERR_FAILED);
         EXPECT_EQ(request->message(), "Create CMPIObjectPath failed.");
         EXPECT_EQ(countOf(*request), 0U);
-        const HandlerLines expected = handler(Requests[which]);
+        const HandlerLines expected = handler(requests[which]);
         EXPECT_EQ(
             lines, sequence({expected.entry(), expected.failure("getAllSensorCMPIObjPaths failed"),
                        expected.exit()}));
@@ -101,21 +102,22 @@ TEST_F(SystemDeviceAssociationFaultTest, SensorPathsThatCannotBeMadeEndInTheFact
 
 TEST_F(SystemDeviceAssociationFaultTest, WithoutAnAssociationPathThereAreNoReferences)
 {
-    for (const auto& kinds : {FromSensor, FromSystem})
+    for (const auto& kinds : {requestsFromSensor, requestsFromSystem})
         for (const Which which : {References, ReferenceNames}) {
             const Fault fault = {BrokerCall::newObjectPath, 2, FaultManner::nullResult};
             const auto [request, lines] = runTraced(kinds[which], fault);
             EXPECT_EQ(request->status.rc, CMPI_RC_ERR_FAILED); // as the broker left it
             EXPECT_EQ(countOf(*request), 0U);
-            const HandlerLines expected = handler(Requests[which]);
+            const HandlerLines expected = handler(requests[which]);
             EXPECT_EQ(lines, sequence({expected.entry(), expected.exit()}));
         }
 }
 
 TEST_F(SystemDeviceAssociationFaultTest, AnAssociatorThatCannotBeMadeIsPassedOnAsItIs)
 {
-    for (const FaultManner manner : Undelivered) {
-        const auto request = run(FromSystem[Associators], {BrokerCall::newInstance, 1, manner});
+    for (const FaultManner manner : undelivered) {
+        const auto request =
+            run(requestsFromSystem[Associators], {BrokerCall::newInstance, 1, manner});
         EXPECT_EQ(request->status.rc, CMPI_RC_OK);
         EXPECT_EQ(request->answer.refused(), 1U);
     }
@@ -125,48 +127,48 @@ TEST_F(SystemDeviceAssociationFaultTest, AnAssociatorThatCannotBeMadeIsPassedOnA
 TEST_F(SystemDeviceAssociationFaultTest, APathThatIsNotToldLeavesTheStatus)
 {
     const Fault fault = {BrokerCall::getObjectPath, 2, FaultManner::nullResult}; // the last
-    for (const RequestKind& kind : {OneInstance, FromSystem[ReferenceNames]})
+    for (const RequestKind& kind : {oneInstance, requestsFromSystem[ReferenceNames]})
         EXPECT_EQ(run(kind, fault)->status.rc, CMPI_RC_OK) << kind;
 }
 
 TEST_F(SystemDeviceAssociationFaultTest, APathWhoseKeyCountReportsAFailureLeavesTheStatus)
 {
-    const auto request = run(OneInstance, {BrokerCall::getKeyCount, 1, FaultManner::errorStatus});
+    const auto request = run(oneInstance, {BrokerCall::getKeyCount, 1, FaultManner::errorStatus});
     EXPECT_EQ(request->status.rc, CMPI_RC_OK);
     EXPECT_EQ(countOf(*request), 1U);
 }
 
 TEST_F(SystemDeviceAssociationFaultTest, NamespacesLeaveTheStatus)
 {
-    expectNamespacesLeaveTheStatus(Names);
-    for (const auto& kinds : {FromSensor, FromSystem})
+    expectNamespacesLeaveTheStatus(nameRequest);
+    for (const auto& kinds : {requestsFromSensor, requestsFromSystem})
         for (const Which which : {Associators, AssociatorNames, References, ReferenceNames})
             expectNamespacesLeaveTheStatus(kinds[which]);
 }
 
 TEST_F(SystemDeviceAssociationFaultTest, TheSensorIsGivenItsNamespaceBeforeTheSystem)
 {
-    expectNameSpacesInOrder(Names, Class, SensorClass, SystemClass);
+    expectNameSpacesInOrder(nameRequest, Class, SensorClass, SystemClass);
 }
 
 TEST_F(SystemDeviceAssociationFaultTest, EveryValueIsWhole)
 {
-    expectWholeValues(Names, Instances, {"GroupComponent", SystemClass});
+    expectWholeValues(nameRequest, instanceRequest, {"GroupComponent", SystemClass});
 }
 
 TEST_F(SystemDeviceAssociationFaultTest, EveryAssociatorNameIsGivenItsNamespaceOnceMore)
 {
-    run(FromSystem[AssociatorNames], std::vector<Fault>{});
+    run(requestsFromSystem[AssociatorNames], std::vector<Fault>{});
     EXPECT_EQ(timesCalled("setNameSpace", SensorClass), 1 + 2 * 2); // and the target's
 }
 
 TEST_F(SystemDeviceAssociationFaultTest, AnAbsentEnumerationHasNoFarEnds)
 {
-    for (const FaultManner manner : Undelivered)
+    for (const FaultManner manner : undelivered)
         for (const Which which : {Associators, AssociatorNames, References, ReferenceNames}) {
             const BrokerCall call = which == Associators ? BrokerCall::enumerateInstances
                                                          : BrokerCall::enumerateInstanceNames;
-            const auto request = run(FromSensor[which], {call, 1, manner, CMPI_RC_OK});
+            const auto request = run(requestsFromSensor[which], {call, 1, manner, CMPI_RC_OK});
             EXPECT_EQ(request->status.rc, CMPI_RC_OK);
             EXPECT_EQ(countOf(*request), 0U);
         }
@@ -176,7 +178,8 @@ TEST_F(SystemDeviceAssociationFaultTest, AssociatorsBeforeABreakAreDeliveredWith
 {
     for (const Which which : {Associators, AssociatorNames})
         for (const BrokerCall call : {BrokerCall::hasNext, BrokerCall::getNext}) {
-            const auto request = run(FromSensor[which], {call, 2, FaultManner::errorStatus});
+            const auto request =
+                run(requestsFromSensor[which], {call, 2, FaultManner::errorStatus});
             EXPECT_EQ(request->status.rc, CMPI_RC_ERR_FAILED);
             EXPECT_EQ(countOf(*request), 1U);
         }
@@ -187,10 +190,10 @@ TEST_F(SystemDeviceAssociationFaultTest, ABreakBetweenFarEndsLeavesNoReferences)
     for (const Which which : {References, ReferenceNames})
         for (const BrokerCall call : {BrokerCall::hasNext, BrokerCall::getNext}) {
             const Fault fault = {call, 2, FaultManner::errorStatus};
-            const auto [request, lines] = runTraced(FromSensor[which], fault);
+            const auto [request, lines] = runTraced(requestsFromSensor[which], fault);
             EXPECT_EQ(request->status.rc, CMPI_RC_ERR_FAILED);
             EXPECT_EQ(countOf(*request), 0U);
-            const HandlerLines expected = handler(Requests[which]);
+            const HandlerLines expected = handler(requests[which]);
             EXPECT_EQ(
                 lines, sequence({expected.entry(),
                            expected.failure("Call to CBEnumInstances of target Class Failed.")}));
@@ -200,8 +203,8 @@ TEST_F(SystemDeviceAssociationFaultTest, ABreakBetweenFarEndsLeavesNoReferences)
 TEST_F(SystemDeviceAssociationFaultTest, AnElementWithoutHandleIsLeftOut)
 {
     for (const Which which : {Associators, AssociatorNames, References, ReferenceNames}) {
-        const auto request =
-            run(FromSensor[which], {BrokerCall::getNext, 1, FaultManner::handleless, CMPI_RC_OK});
+        const auto request = run(requestsFromSensor[which],
+            {BrokerCall::getNext, 1, FaultManner::handleless, CMPI_RC_OK});
         EXPECT_EQ(request->status.rc, CMPI_RC_OK);
         EXPECT_EQ(countOf(*request), 1U);
     }
@@ -209,8 +212,8 @@ TEST_F(SystemDeviceAssociationFaultTest, AnElementWithoutHandleIsLeftOut)
 
 TEST_F(SystemDeviceAssociationFaultTest, AReferenceThatCannotBeMadeIsLeftOut)
 {
-    for (const FaultManner manner : Undelivered)
-        for (const auto& kinds : {FromSensor, FromSystem})
+    for (const FaultManner manner : undelivered)
+        for (const auto& kinds : {requestsFromSensor, requestsFromSystem})
             for (const Which which : {References, ReferenceNames}) {
                 const auto request = run(kinds[which], {BrokerCall::newInstance, 1, manner});
                 EXPECT_EQ(request->status.rc, CMPI_RC_OK);

@@ -13,13 +13,13 @@ using ::testing::ElementsAre;
 using ::testing::IsEmpty;
 
 constexpr const char* Class = "ZUMLO_SensorSystemDevice";
-constexpr const char* Provider = "SensorSystemDeviceProvider";
-const BrokerMessage LeadsToSensors = {1, Provider, "Target Class is PhysicalPackageClass"};
-const BrokerMessage LeadsToSystems = {1, Provider, "Target Class is ComputerSystemClass"};
+constexpr const char* provider = "SensorSystemDeviceProvider";
+const BrokerMessage leadsToSensors = {1, provider, "Target Class is PhysicalPackageClass"};
+const BrokerMessage leadsToSystems = {1, provider, "Target Class is ComputerSystemClass"};
 
 class SystemDeviceAssociationTest : public AssociationTest {
 protected:
-    explicit SystemDeviceAssociationTest(const std::vector<ScriptedNode>& nodes = ThreeSensors,
+    explicit SystemDeviceAssociationTest(const std::vector<ScriptedNode>& nodes = threeSensors,
         const std::vector<std::string>& systems = {"host", "guest"})
         : AssociationTest(SensorSystemDeviceProvider_Create_InstanceMI,
               SensorSystemDeviceProvider_Create_AssociationMI, nodes, systems)
@@ -63,7 +63,7 @@ protected:
 
 class SystemDeviceWithoutSystemsTest : public SystemDeviceAssociationTest {
 protected:
-    SystemDeviceWithoutSystemsTest() : SystemDeviceAssociationTest(ThreeSensors, {}) {}
+    SystemDeviceWithoutSystemsTest() : SystemDeviceAssociationTest(threeSensors, {}) {}
 };
 
 // ---- Associators ----
@@ -79,7 +79,7 @@ TEST_F(SystemDeviceAssociationTest, ASensorIsAssociatedWithEverySystem)
     EXPECT_EQ(answer_.instances()[0]->className(), SystemClass);
     EXPECT_EQ(answer_.instances()[0]->objectPath().nameSpace(), "root/elsewhere"); // unchanged
     EXPECT_FALSE(answer_.isDone());
-    EXPECT_THAT(messages_, ElementsAre(LeadsToSystems));
+    EXPECT_THAT(messages_, ElementsAre(leadsToSystems));
     ASSERT_EQ(systems_.calls.size(), 1U);
     EXPECT_EQ(systems_.calls[0].operation, "enumerateInstances");
     EXPECT_EQ(systems_.calls[0].path, "//" + systemName_ + "/root/other:ZUMLO_ComputerSystem");
@@ -98,7 +98,7 @@ TEST_F(SystemDeviceAssociationTest, ASystemIsAssociatedWithEverySensor)
     EXPECT_EQ(answer_.instances()[0]->objectPath().toText(), sensor("A:/1", "root/other").toText());
     EXPECT_EQ(answer_.instances()[3]->properties().size(), 5U);
     EXPECT_FALSE(answer_.isDone());
-    EXPECT_THAT(messages_, ElementsAre(LeadsToSensors, LeadsToSensors));
+    EXPECT_THAT(messages_, ElementsAre(leadsToSensors, leadsToSensors));
     EXPECT_TRUE(systems_.calls.empty());
 }
 
@@ -233,7 +233,7 @@ TEST_F(SystemDeviceAssociationTest, ReferencesOfASystemPairItWithEverySensor)
     EXPECT_EQ(second.objectPath().nameSpace(), "root/other");
     EXPECT_EQ(second.objectPath().host(), systemName_);
     EXPECT_FALSE(answer_.isDone());
-    EXPECT_THAT(messages_, ElementsAre(LeadsToSensors));
+    EXPECT_THAT(messages_, ElementsAre(leadsToSensors));
     EXPECT_TRUE(systems_.calls.empty());
 }
 
@@ -248,7 +248,7 @@ TEST_F(SystemDeviceAssociationTest, ReferencesOfASensorPairItWithEverySystem)
         ElementsAre("GroupComponent = ref " + system("host", "root/elsewhere").toText(),
             "PartComponent = ref " + source.toText()));
     EXPECT_FALSE(answer_.isDone());
-    EXPECT_THAT(messages_, ElementsAre(LeadsToSystems));
+    EXPECT_THAT(messages_, ElementsAre(leadsToSystems));
     ASSERT_EQ(systems_.calls.size(), 1U);
     EXPECT_EQ(systems_.calls[0].operation, "enumerateInstanceNames");
     EXPECT_EQ(systems_.calls[0].path, "//" + systemName_ + "/root/other:ZUMLO_ComputerSystem");
@@ -287,8 +287,8 @@ TEST_F(SystemDeviceAssociationTest, ReferencesOfAnotherSourceHaveNoTarget)
         expectFailure(references(*source), "Object Path is NULL in References.");
         expectFailure(referenceNames(*source), "Object Path is NULL in ReferenceNames.");
         EXPECT_THAT(
-            messages_, ElementsAre(BrokerMessage{2, Provider, "Object Path is NULL in References."},
-                           BrokerMessage{2, Provider, "Object Path is NULL in ReferenceNames."}));
+            messages_, ElementsAre(BrokerMessage{2, provider, "Object Path is NULL in References."},
+                           BrokerMessage{2, provider, "Object Path is NULL in ReferenceNames."}));
     }
     expectNothing(false);
 }

@@ -13,23 +13,23 @@
 namespace Testing::SystemDevice {
 
 inline constexpr const char* Class = "ZUMLO_SensorSystemDevice";
-inline constexpr const char* Provider = "SensorSystemDeviceProvider";
+inline constexpr const char* provider = "SensorSystemDeviceProvider";
 
-inline const RequestKinds Kinds = {
+inline const RequestKinds kinds = {
     SensorSystemDeviceProvider_Create_InstanceMI, SensorSystemDeviceProvider_Create_AssociationMI};
-inline const SourceMaker Keyless = pathMaker(Class);
-inline const SourceMaker Sensor = sensorMaker("B:/2");
-inline const SourceMaker System = [](const Host::Request&) -> Host::ObjectPath& {
+inline const SourceMaker keylessSource = pathMaker(Class);
+inline const SourceMaker sensorSource = sensorMaker("B:/2");
+inline const SourceMaker systemSource = [](const Host::Request&) -> Host::ObjectPath& {
     return ComputerSystems({}).pathTo("host");
 };
 
-inline const RequestKind Names = Kinds.names(Keyless);
-inline const RequestKind Instances = Kinds.instances(Keyless);
-inline const RequestKind OneInstance =
-    Kinds.one("oneInstance", pairMaker(Class, "GroupComponent", System, "PartComponent", Sensor));
-inline const AssociationRequests FromSensor = Kinds.along("Sensor", Sensor);
-inline const AssociationRequests FromSystem = Kinds.along("System", System);
-inline const std::string Requests[] = {
+inline const RequestKind nameRequest = kinds.names(keylessSource);
+inline const RequestKind instanceRequest = kinds.instances(keylessSource);
+inline const RequestKind oneInstance = kinds.one(
+    "oneInstance", pairMaker(Class, "GroupComponent", systemSource, "PartComponent", sensorSource));
+inline const AssociationRequests requestsFromSensor = kinds.along("Sensor", sensorSource);
+inline const AssociationRequests requestsFromSystem = kinds.along("System", systemSource);
+inline const std::string requests[] = {
     "Associators", "AssociatorNames", "References", "ReferenceNames"};
 
 class SystemDeviceFaultTest : public AssociationFaultTest {
@@ -38,7 +38,7 @@ protected:
 
     static HandlerLines handler(const std::string& request)
     {
-        return {"SenosrSystemDeviceProvider", Provider, "SensorSystemDevice_" + request};
+        return {"SenosrSystemDeviceProvider", provider, "SensorSystemDevice_" + request};
     }
 
     static std::size_t countOf(const FaultyRequest& request)

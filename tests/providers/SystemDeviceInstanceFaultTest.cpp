@@ -12,7 +12,7 @@ using namespace Testing;
 using namespace Testing::SystemDevice;
 using namespace ::testing;
 
-const std::string Gap(21, ' ');
+const std::string columnGap(21, ' ');
 
 class SystemDeviceInstanceFaultTest : public SystemDeviceFaultTest {
 protected:
@@ -20,11 +20,11 @@ protected:
     void expectBuilderFailure(const Fault& fault, const std::string& statusText,
         const std::string& traceText, bool hasExitMark)
     {
-        for (const RequestKind& kind : {Instances, OneInstance}) {
+        for (const RequestKind& kind : {instanceRequest, oneInstance}) {
             const auto [request, lines] = runTraced(kind, fault);
-            expectEmptyAnswer(*request, statusText, {2, Provider, traceText});
+            expectEmptyAnswer(*request, statusText, {2, provider, traceText});
             const HandlerLines builder = {
-                "SenosrSystemDeviceProvider", Provider, "sensorSystemDeviceCMPIInstances"};
+                "SenosrSystemDeviceProvider", provider, "sensorSystemDeviceCMPIInstances"};
             const HandlerLines outer =
                 handler(kind.name == "instances" ? "EnumInstances" : "GetInstance");
             EXPECT_THAT(lines, ElementsAreArray(sequence({outer.entry(), builder.entry(),
@@ -36,9 +36,9 @@ protected:
     std::unique_ptr<FaultyRequest> expectNamesFailure(const Fault& fault,
         const std::string& statusText, const std::string& traceText, bool hasExitMark)
     {
-        auto [request, lines] = runTraced(Names, fault);
+        auto [request, lines] = runTraced(nameRequest, fault);
         expectBrokenOff(*request, statusText);
-        EXPECT_THAT(request->messages, ElementsAre(BrokerMessage{2, Provider, traceText}));
+        EXPECT_THAT(request->messages, ElementsAre(BrokerMessage{2, provider, traceText}));
         const HandlerLines names = handler("EnumInstanceNames");
         EXPECT_THAT(lines,
             ElementsAreArray(sequence({names.entry(), hasExitMark ? names.exit() : Lines()})));
@@ -49,43 +49,43 @@ protected:
 // ---- The iteration over all pairs. Paths are made in this order: the class of systems, then for
 // ---- each system both sensors and their associations. ----
 
-constexpr unsigned SystemPath = 1;
-constexpr unsigned FirstSensor = 2;
-constexpr unsigned FirstAssociation = 4;
-constexpr unsigned LastAssociation = 9;
-constexpr unsigned LastKeyOfFirstSensor = 4;
+constexpr unsigned systemPath = 1;
+constexpr unsigned firstSensor = 2;
+constexpr unsigned firstAssociation = 4;
+constexpr unsigned lastAssociation = 9;
+constexpr unsigned lastKeyOfFirstSensor = 4;
 
 TEST_F(SystemDeviceInstanceFaultTest, NamesEndAtASystemPathThatCannotBeMade)
 {
-    for (const FaultManner manner : Undelivered)
+    for (const FaultManner manner : undelivered)
         for (const BrokerCall call : {BrokerCall::newObjectPath, BrokerCall::getNameSpace})
-            expectNamesFailure({call, SystemPath, manner}, "Create CMPIObjectPath failed.",
+            expectNamesFailure({call, systemPath, manner}, "Create CMPIObjectPath failed.",
                 "Create CMPIObjectPath failed for ComputerSystemClass.", true);
     EXPECT_THAT(systems_.calls, IsEmpty());
 }
 
 TEST_F(SystemDeviceInstanceFaultTest, NamesEndAtASensorPathThatIsGone)
 {
-    expectNamesFailure({BrokerCall::addKey, LastKeyOfFirstSensor, FaultManner::lostHandle},
+    expectNamesFailure({BrokerCall::addKey, lastKeyOfFirstSensor, FaultManner::lostHandle},
         "CMPIObjectPath is NULL for Sensor", "CMPIObjectPath is NULL for Sensor Class", false);
 }
 
 TEST_F(SystemDeviceInstanceFaultTest, NamesEndAtAnAssociationPathThatCannotBeMade)
 {
-    for (const FaultManner manner : Undelivered)
-        for (const unsigned nth : {FirstAssociation, LastAssociation}) {
+    for (const FaultManner manner : undelivered)
+        for (const unsigned nth : {firstAssociation, lastAssociation}) {
             const auto request = expectNamesFailure({BrokerCall::newObjectPath, nth, manner},
-                "Create CMPIObjectPath failed" + Gap + "for SensorSystemDeviceProvider.",
-                "Create CMPIObjectPath failed for" + Gap + "SensorSystemDeviceClass.", false);
-            EXPECT_EQ(request->answer.paths().size(), nth == FirstAssociation ? 0U : 3U);
+                "Create CMPIObjectPath failed" + columnGap + "for SensorSystemDeviceProvider.",
+                "Create CMPIObjectPath failed for" + columnGap + "SensorSystemDeviceClass.", false);
+            EXPECT_EQ(request->answer.paths().size(), nth == firstAssociation ? 0U : 3U);
         }
 }
 
 TEST_F(SystemDeviceInstanceFaultTest, NamesWithoutSensorPathsEndInTheFactorysStatus)
 {
-    for (const FaultManner manner : Undelivered) {
+    for (const FaultManner manner : undelivered) {
         const auto [request, lines] =
-            runTraced(Names, {BrokerCall::newObjectPath, FirstSensor, manner});
+            runTraced(nameRequest, {BrokerCall::newObjectPath, firstSensor, manner});
         expectBrokenOff(*request, "Create CMPIObjectPath failed.");
         EXPECT_EQ(request->messages.size(), 1U); // the factory's
         EXPECT_EQ(lines, handler("EnumInstanceNames").entry());
@@ -96,7 +96,7 @@ TEST_F(SystemDeviceInstanceFaultTest, NamesAnswerAFailedUpcallWithOkAndAMessage)
 {
     for (const FaultManner manner :
         {FaultManner::nullResult, FaultManner::handleless, FaultManner::errorStatus}) {
-        const auto request = run(Names, {BrokerCall::enumerateInstanceNames, 1, manner});
+        const auto request = run(nameRequest, {BrokerCall::enumerateInstanceNames, 1, manner});
         EXPECT_EQ(request->status.rc, CMPI_RC_OK);
         EXPECT_EQ(request->message(), "CBEnumInstanceNames Failed for the ZUMLO_ComputerSystem");
         EXPECT_EQ(countOf(*request), 0U);
@@ -107,8 +107,8 @@ TEST_F(SystemDeviceInstanceFaultTest, NamesAnswerAFailedUpcallWithOkAndAMessage)
 
 TEST_F(SystemDeviceInstanceFaultTest, AnAbsentEnumerationHasNoSystems)
 {
-    for (const FaultManner manner : Undelivered)
-        for (const RequestKind& kind : {Names, Instances, OneInstance}) {
+    for (const FaultManner manner : undelivered)
+        for (const RequestKind& kind : {nameRequest, instanceRequest, oneInstance}) {
             const auto request =
                 run(kind, {BrokerCall::enumerateInstanceNames, 1, manner, CMPI_RC_OK});
             EXPECT_EQ(request->status.rc, CMPI_RC_OK);
@@ -123,7 +123,7 @@ TEST_F(SystemDeviceInstanceFaultTest, NamesEndWhereTheEnumerationBreaks)
     for (const BrokerCall call : {BrokerCall::hasNext, BrokerCall::getNext})
         for (const FaultManner manner : {FaultManner::nullResult, FaultManner::errorStatus}) {
             const Fault fault = {call, 2, manner, CMPI_RC_ERR_FAILED};
-            const auto [request, lines] = runTraced(Names, fault);
+            const auto [request, lines] = runTraced(nameRequest, fault);
             EXPECT_EQ(request->status.rc, CMPI_RC_ERR_FAILED); // as the broker left it
             EXPECT_EQ(countOf(*request), 2U);                  // of the first system
             EXPECT_FALSE(request->answer.isDone());
@@ -133,8 +133,8 @@ TEST_F(SystemDeviceInstanceFaultTest, NamesEndWhereTheEnumerationBreaks)
 
 TEST_F(SystemDeviceInstanceFaultTest, TheBuilderReportsASystemPathThatCannotBeMade)
 {
-    for (const FaultManner manner : Undelivered)
-        expectBuilderFailure({BrokerCall::newObjectPath, SystemPath, manner},
+    for (const FaultManner manner : undelivered)
+        expectBuilderFailure({BrokerCall::newObjectPath, systemPath, manner},
             "Create CMPIObjectPath" + std::string(12, ' ') + "failed.",
             "Create CMPIObjectPath failed for" + std::string(13, ' ') + "ComputerSystemClass.",
             true);
@@ -144,16 +144,16 @@ TEST_F(SystemDeviceInstanceFaultTest, TheBuilderReportsASensorPathThatIsGone)
 {
     const std::string text = "CMPIObjectPath is NULL for Sensor Provider";
     expectBuilderFailure(
-        {BrokerCall::addKey, LastKeyOfFirstSensor, FaultManner::lostHandle}, text, text, false);
+        {BrokerCall::addKey, lastKeyOfFirstSensor, FaultManner::lostHandle}, text, text, false);
 }
 
 TEST_F(SystemDeviceInstanceFaultTest, TheBuilderReportsAnAssociationPathThatCannotBeMade)
 {
-    for (const FaultManner manner : Undelivered)
-        for (const unsigned nth : {FirstAssociation, LastAssociation})
+    for (const FaultManner manner : undelivered)
+        for (const unsigned nth : {firstAssociation, lastAssociation})
             expectBuilderFailure({BrokerCall::newObjectPath, nth, manner},
                 "Create CMPIObjectPath failed for HostedAccessPoint",
-                "Create CMPIObjectPath failed for" + Gap + "HostedAccessPoint.", false);
+                "Create CMPIObjectPath failed for" + columnGap + "HostedAccessPoint.", false);
 }
 
 TEST_F(SystemDeviceInstanceFaultTest, TheBuilderEndsSilentlyAtAnUpcallAnElementOrSensorsThatFail)
@@ -162,13 +162,13 @@ TEST_F(SystemDeviceInstanceFaultTest, TheBuilderEndsSilentlyAtAnUpcallAnElementO
         {Fault{BrokerCall::enumerateInstanceNames, 1, FaultManner::nullResult},
             Fault{BrokerCall::hasNext, 2, FaultManner::errorStatus},
             Fault{BrokerCall::getNext, 2, FaultManner::errorStatus},
-            Fault{BrokerCall::newObjectPath, FirstSensor, FaultManner::nullResult}}) {
-        const auto [request, lines] = runTraced(Instances, fault);
+            Fault{BrokerCall::newObjectPath, firstSensor, FaultManner::nullResult}}) {
+        const auto [request, lines] = runTraced(instanceRequest, fault);
         EXPECT_EQ(request->status.rc, CMPI_RC_OK);
         EXPECT_EQ(countOf(*request), 0U);
         EXPECT_TRUE(request->answer.isDone());
         const HandlerLines builder = {
-            "SenosrSystemDeviceProvider", Provider, "sensorSystemDeviceCMPIInstances"};
+            "SenosrSystemDeviceProvider", provider, "sensorSystemDeviceCMPIInstances"};
         const HandlerLines outer = handler("EnumInstances");
         EXPECT_EQ(lines, sequence({outer.entry(), builder.entry(), outer.exit()}));
     }
@@ -176,12 +176,12 @@ TEST_F(SystemDeviceInstanceFaultTest, TheBuilderEndsSilentlyAtAnUpcallAnElementO
 
 TEST_F(SystemDeviceInstanceFaultTest, AnInstanceThatCannotBeMadeIsPassedOnButPassedOverInASearch)
 {
-    for (const FaultManner manner : Undelivered) {
-        const auto all = run(Instances, {BrokerCall::newInstance, 1, manner});
+    for (const FaultManner manner : undelivered) {
+        const auto all = run(instanceRequest, {BrokerCall::newInstance, 1, manner});
         EXPECT_EQ(all->status.rc, CMPI_RC_OK);
         EXPECT_EQ(all->answer.refused(), 1U);
         EXPECT_EQ(all->answer.instances().size(), 3U);
-        const auto one = run(OneInstance, {BrokerCall::newInstance, 1, manner});
+        const auto one = run(oneInstance, {BrokerCall::newInstance, 1, manner});
         EXPECT_EQ(one->status.rc, CMPI_RC_OK);
         EXPECT_EQ(countOf(*one), 1U); // the pair is the second one
     }

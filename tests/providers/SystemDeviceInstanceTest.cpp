@@ -14,17 +14,17 @@ using ::testing::ElementsAre;
 using ::testing::IsEmpty;
 
 constexpr const char* Class = "ZUMLO_SensorSystemDevice";
-constexpr const char* Provider = "SensorSystemDeviceProvider";
-constexpr const char* NoKeyText = "At least one key should be passed";
+constexpr const char* provider = "SensorSystemDeviceProvider";
+constexpr const char* noKeyText = "At least one key should be passed";
 
-const AssociationClass Association = {Class, "GroupComponent", "PartComponent",
+const AssociationClass association = {Class, "GroupComponent", "PartComponent",
     SensorSystemDeviceProvider_Create_InstanceMI, SensorSystemDeviceProvider_Create_AssociationMI};
 
 class SystemDeviceInstanceTest : public AssociationInstanceTest {
 protected:
-    explicit SystemDeviceInstanceTest(const std::vector<ScriptedNode>& nodes = ThreeSensors,
+    explicit SystemDeviceInstanceTest(const std::vector<ScriptedNode>& nodes = threeSensors,
         const std::vector<std::string>& systems = {"host", "guest"})
-        : AssociationInstanceTest(Association, nodes, systems)
+        : AssociationInstanceTest(association, nodes, systems)
     {
     }
 
@@ -40,7 +40,7 @@ protected:
 
 class SystemDeviceOfNoSystemTest : public SystemDeviceInstanceTest {
 protected:
-    SystemDeviceOfNoSystemTest() : SystemDeviceInstanceTest(ThreeSensors, {}) {}
+    SystemDeviceOfNoSystemTest() : SystemDeviceInstanceTest(threeSensors, {}) {}
 };
 
 class SystemDeviceOfNoSensorTest : public SystemDeviceInstanceTest {
@@ -50,10 +50,10 @@ protected:
 
 class SystemDeviceOfOnePairTest : public SystemDeviceInstanceTest {
 protected:
-    SystemDeviceOfOnePairTest() : SystemDeviceInstanceTest({ThreeSensors[0]}, {"host"}) {}
+    SystemDeviceOfOnePairTest() : SystemDeviceInstanceTest({threeSensors[0]}, {"host"}) {}
 };
 
-const std::vector<std::string> AllPairs = {
+const std::vector<std::string> allPairs = {
     "host A:/1", "host B:/2", "host C:/3", "guest A:/1", "guest B:/2", "guest C:/3"};
 
 // ---- EnumInstanceNames ----
@@ -61,7 +61,7 @@ const std::vector<std::string> AllPairs = {
 TEST_F(SystemDeviceInstanceTest, NamesArePairsSystemBySystem)
 {
     expectOk(enumerateNames(path(Class)));
-    EXPECT_EQ(pairs(), AllPairs);
+    EXPECT_EQ(pairs(), allPairs);
     EXPECT_TRUE(answer_.isDone());
     EXPECT_THAT(messages_, IsEmpty());
     expectUpcall("root/cimv2:ZUMLO_ComputerSystem");
@@ -127,7 +127,7 @@ TEST_F(SystemDeviceInstanceTest, ElementsThatAreNoPathsArePassedOverInNames)
 {
     systems_.isMixed = true;
     expectOk(enumerateNames(path(Class)));
-    EXPECT_EQ(pairs(), AllPairs);
+    EXPECT_EQ(pairs(), allPairs);
     EXPECT_TRUE(answer_.isDone());
 }
 
@@ -137,7 +137,7 @@ TEST_F(SystemDeviceInstanceTest, InstancesArePairsSystemBySystem)
 {
     systems_.nameSpace = "root/elsewhere";
     expectOk(enumerate(path(Class, {}, "root/other")));
-    EXPECT_EQ(pairs(), AllPairs);
+    EXPECT_EQ(pairs(), allPairs);
     EXPECT_TRUE(answer_.isDone());
     EXPECT_THAT(messages_, IsEmpty());
     expectUpcall("root/other:ZUMLO_ComputerSystem");
@@ -185,7 +185,7 @@ TEST_F(SystemDeviceInstanceTest, ElementsThatAreNoPathsArePassedOverInInstances)
 {
     systems_.isMixed = true;
     expectOk(enumerate(path(Class)));
-    EXPECT_EQ(pairs(), AllPairs);
+    EXPECT_EQ(pairs(), allPairs);
 }
 
 TEST_F(SystemDeviceInstanceTest, TheBuilderKeepsWhatIsThereAndSaysWhetherItFailed)
@@ -265,9 +265,9 @@ TEST_F(SystemDeviceInstanceTest, AReferenceOfAnotherTypeFindsNothing)
 
 TEST_F(SystemDeviceInstanceTest, APathWithoutKeysIsRefusedInAClosedResult)
 {
-    expectFailure(get(path(Class)), NoKeyText);
+    expectFailure(get(path(Class)), noKeyText);
     expectNothing(true);
-    EXPECT_THAT(messages_, ElementsAre(BrokerMessage{2, Provider, NoKeyText}));
+    EXPECT_THAT(messages_, ElementsAre(BrokerMessage{2, provider, noKeyText}));
     EXPECT_TRUE(systems_.calls.empty());
 }
 

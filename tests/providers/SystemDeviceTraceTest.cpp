@@ -13,7 +13,7 @@ using namespace Testing;
 using ::testing::ElementsAreArray;
 
 constexpr const char* Class = "ZUMLO_SensorSystemDevice";
-const std::string UpcallFailed = "Call to CBEnumInstances of target Class Failed.";
+const std::string upcallFailed = "Call to CBEnumInstances of target Class Failed.";
 
 HandlerLines handler(const std::string& function)
 {
@@ -25,15 +25,15 @@ HandlerLines request(const std::string& name)
     return handler("SensorSystemDevice_" + name);
 }
 
-const HandlerLines Builder = handler("sensorSystemDeviceCMPIInstances");
-const Lines Built = builtFactory({"_createSensorMap"});
-const Lines BuiltWithoutSensors = builtFactory({});
-const Lines SensorPaths = operation("getAllSensorCMPIObjPaths");
+const HandlerLines builder = handler("sensorSystemDeviceCMPIInstances");
+const Lines builtLines = builtFactory({"_createSensorMap"});
+const Lines builtWithoutSensors = builtFactory({});
+const Lines sensorPaths = operation("getAllSensorCMPIObjPaths");
 
 class SystemDeviceTraceTest : public AssociationTest {
 protected:
     explicit SystemDeviceTraceTest(
-        const std::vector<ScriptedNode>& nodes = {ThreeSensors[0], ThreeSensors[1]})
+        const std::vector<ScriptedNode>& nodes = {threeSensors[0], threeSensors[1]})
         : AssociationTest(SensorSystemDeviceProvider_Create_InstanceMI,
               SensorSystemDeviceProvider_Create_AssociationMI, nodes, {"host", "guest"})
     {
@@ -47,14 +47,14 @@ protected:
 
 // ---- Instances. The sensors are fetched for each of the two systems. ----
 
-const Lines Fetched = sequence({counted(), SensorPaths});
+const Lines fetched = sequence({counted(), sensorPaths});
 
 TEST_F(SystemDeviceTraceTest, OfEnumeratedNames)
 {
     const Host::ObjectPath& ref = path(Class);
     const HandlerLines lines = request("EnumInstanceNames");
     EXPECT_THAT(traceOf([&] { enumerateNames(ref); }),
-        ElementsAreArray(sequence({lines.entry(), Built, Fetched, Fetched, lines.exit()})));
+        ElementsAreArray(sequence({lines.entry(), builtLines, fetched, fetched, lines.exit()})));
 }
 
 TEST_F(SystemDeviceEmptyTraceTest, OfNamesWithoutSensors)
@@ -62,7 +62,7 @@ TEST_F(SystemDeviceEmptyTraceTest, OfNamesWithoutSensors)
     const Host::ObjectPath& ref = path(Class);
     const HandlerLines lines = request("EnumInstanceNames");
     EXPECT_THAT(traceOf([&] { enumerateNames(ref); }),
-        ElementsAreArray(sequence({lines.entry(), BuiltWithoutSensors, Fetched, lines.exit()})));
+        ElementsAreArray(sequence({lines.entry(), builtWithoutSensors, fetched, lines.exit()})));
 }
 
 TEST_F(SystemDeviceTraceTest, OfNamesWithoutAnybodyToServeSystemsHasNoExitMark)
@@ -70,7 +70,7 @@ TEST_F(SystemDeviceTraceTest, OfNamesWithoutAnybodyToServeSystemsHasNoExitMark)
     systems_.refusal = CMPI_RC_ERR_NOT_SUPPORTED;
     const Host::ObjectPath& ref = path(Class);
     EXPECT_THAT(traceOf([&] { enumerateNames(ref); }),
-        ElementsAreArray(sequence({request("EnumInstanceNames").entry(), Built})));
+        ElementsAreArray(sequence({request("EnumInstanceNames").entry(), builtLines})));
 }
 
 TEST_F(SystemDeviceTraceTest, OfEnumeratedInstances)
@@ -78,8 +78,8 @@ TEST_F(SystemDeviceTraceTest, OfEnumeratedInstances)
     const Host::ObjectPath& ref = path(Class);
     const HandlerLines lines = request("EnumInstances");
     EXPECT_THAT(traceOf([&] { enumerate(ref); }),
-        ElementsAreArray(sequence({lines.entry(), Builder.entry(), Built, counted(), Fetched,
-            Fetched, Builder.exit(), lines.exit()})));
+        ElementsAreArray(sequence({lines.entry(), builder.entry(), builtLines, counted(), fetched,
+            fetched, builder.exit(), lines.exit()})));
 }
 
 // A builder that fails writes no exit mark.
@@ -90,7 +90,7 @@ TEST_F(SystemDeviceTraceTest, OfInstancesWithoutAnybodyToServeSystems)
     const HandlerLines lines = request("EnumInstances");
     EXPECT_THAT(traceOf([&] { enumerate(ref); }),
         ElementsAreArray(
-            sequence({lines.entry(), Builder.entry(), Built, counted(), lines.exit()})));
+            sequence({lines.entry(), builder.entry(), builtLines, counted(), lines.exit()})));
 }
 
 TEST_F(SystemDeviceEmptyTraceTest, OfInstancesWithoutSensors)
@@ -98,8 +98,8 @@ TEST_F(SystemDeviceEmptyTraceTest, OfInstancesWithoutSensors)
     const Host::ObjectPath& ref = path(Class);
     const HandlerLines lines = request("EnumInstances");
     EXPECT_THAT(traceOf([&] { enumerate(ref); }),
-        ElementsAreArray(sequence({lines.entry(), Builder.entry(), BuiltWithoutSensors, counted(),
-            Fetched, lines.exit()})));
+        ElementsAreArray(sequence({lines.entry(), builder.entry(), builtWithoutSensors, counted(),
+            fetched, lines.exit()})));
 }
 
 TEST_F(SystemDeviceTraceTest, OfAnInstanceSearched)
@@ -107,8 +107,8 @@ TEST_F(SystemDeviceTraceTest, OfAnInstanceSearched)
     const Host::ObjectPath& ref = path(Class, {{"Other", "x"}});
     const HandlerLines lines = request("GetInstance");
     EXPECT_THAT(traceOf([&] { get(ref); }),
-        ElementsAreArray(sequence({lines.entry(), Builder.entry(), Built, counted(), Fetched,
-            Fetched, Builder.exit(), lines.exit()})));
+        ElementsAreArray(sequence({lines.entry(), builder.entry(), builtLines, counted(), fetched,
+            fetched, builder.exit(), lines.exit()})));
 }
 
 TEST_F(SystemDeviceTraceTest, OfARequestWithoutKeysHasNoFactory)
@@ -127,12 +127,12 @@ TEST_F(SystemDeviceTraceTest, OfTheAssociatorsOfASensor)
     const Host::ObjectPath& source = sensor("B:/2");
     const HandlerLines instances = request("Associators");
     EXPECT_THAT(traceOf([&] { associators(source, {.resultClass = "CIM_ComputerSystem"}); }),
-        ElementsAreArray(sequence({instances.entry(), Built,
+        ElementsAreArray(sequence({instances.entry(), builtLines,
             lookedUp(Class, "CIM_ComputerSystem", 1221), instances.exit()})));
     const HandlerLines names = request("AssociatorNames");
     EXPECT_THAT(traceOf([&] { associatorNames(source, {.associationClass = Class}); }),
         ElementsAreArray(
-            sequence({names.entry(), Built, lookedUp(Class, "(null)", 1221), names.exit()})));
+            sequence({names.entry(), builtLines, lookedUp(Class, "(null)", 1221), names.exit()})));
 }
 
 TEST_F(SystemDeviceTraceTest, OfTheAssociatorsOfASystem)
@@ -142,13 +142,13 @@ TEST_F(SystemDeviceTraceTest, OfTheAssociatorsOfASystem)
     const Lines instance = operation("makeSensorInstance", 269, 737);
     EXPECT_THAT(traceOf([&] { associators(source); }),
         ElementsAreArray(
-            sequence({instances.entry(), Built, lookedUp(Class, "(null)", 1205), counted(),
+            sequence({instances.entry(), builtLines, lookedUp(Class, "(null)", 1205), counted(),
                 around(operation("getAllSensorCMPIInstances"), sequence({instance, instance})),
                 instances.exit()})));
     const HandlerLines names = request("AssociatorNames");
     EXPECT_THAT(traceOf([&] { associatorNames(source); }),
         ElementsAreArray(sequence(
-            {names.entry(), Built, lookedUp(Class, "(null)", 1205), Fetched, names.exit()})));
+            {names.entry(), builtLines, lookedUp(Class, "(null)", 1205), fetched, names.exit()})));
 }
 
 TEST_F(SystemDeviceTraceTest, OfAResultClassThatIsNotServedHasNoExitMark)
@@ -157,10 +157,10 @@ TEST_F(SystemDeviceTraceTest, OfAResultClassThatIsNotServedHasNoExitMark)
     const Host::ObjectPath& fromSystem = system("host");
     EXPECT_THAT(traceOf([&] { associators(fromSensor, {.resultClass = "X"}); }),
         ElementsAreArray(
-            sequence({request("Associators").entry(), Built, lookedUp(Class, "X", 1221)})));
+            sequence({request("Associators").entry(), builtLines, lookedUp(Class, "X", 1221)})));
     EXPECT_THAT(traceOf([&] { associatorNames(fromSystem, {.resultClass = "X"}); }),
-        ElementsAreArray(
-            sequence({request("AssociatorNames").entry(), Built, lookedUp(Class, "X", 1205)})));
+        ElementsAreArray(sequence(
+            {request("AssociatorNames").entry(), builtLines, lookedUp(Class, "X", 1205)})));
 }
 
 TEST_F(SystemDeviceTraceTest, OfASourceWithoutTarget)
@@ -168,7 +168,7 @@ TEST_F(SystemDeviceTraceTest, OfASourceWithoutTarget)
     const Host::ObjectPath& source = capabilities();
     const Lines lookUp = lookedUp(Class, "(null)", 1259);
     const auto expected = [&](const std::string& name) {
-        return sequence({request(name).entry(), Built, lookUp, request(name).exit()});
+        return sequence({request(name).entry(), builtLines, lookUp, request(name).exit()});
     };
     EXPECT_THAT(traceOf([&] { associators(source); }), ElementsAreArray(expected("Associators")));
     EXPECT_THAT(
@@ -177,7 +177,7 @@ TEST_F(SystemDeviceTraceTest, OfASourceWithoutTarget)
         const HandlerLines lines = request(name);
         EXPECT_THAT(
             traceOf([&] { name == "References" ? references(source) : referenceNames(source); }),
-            ElementsAreArray(sequence({lines.entry(), Built, counted(), lookUp,
+            ElementsAreArray(sequence({lines.entry(), builtLines, counted(), lookUp,
                 lines.failure("Object Path is NULL in " + name), lines.exit()})));
     }
 }
@@ -187,8 +187,8 @@ TEST_F(SystemDeviceTraceTest, OfATargetThatNobodyHereLeadsTo)
     const Host::ObjectPath& source = sensor("B:/2");
     const char* const other = "ZUMLO_SensorElementCapabilities";
     const auto expected = [&](const std::string& name) {
-        return sequence(
-            {request(name).entry(), Built, lookedUp(other, "(null)", 1236), request(name).exit()});
+        return sequence({request(name).entry(), builtLines, lookedUp(other, "(null)", 1236),
+            request(name).exit()});
     };
     EXPECT_THAT(traceOf([&] { associators(source, {.associationClass = other}); }),
         ElementsAreArray(expected("Associators")));
@@ -203,16 +203,16 @@ TEST_F(SystemDeviceEmptyTraceTest, OfSensorsThatAreNotThere)
     const std::string failed = "getAllSensorCMPIObjPaths failed";
     const HandlerLines names = request("AssociatorNames");
     EXPECT_THAT(traceOf([&] { associatorNames(source); }),
-        ElementsAreArray(sequence({names.entry(), BuiltWithoutSensors, lookUp, Fetched,
+        ElementsAreArray(sequence({names.entry(), builtWithoutSensors, lookUp, fetched,
             names.failure(failed), names.exit()})));
     const HandlerLines instances = request("References");
     EXPECT_THAT(traceOf([&] { references(source); }),
-        ElementsAreArray(sequence({instances.entry(), BuiltWithoutSensors, counted(), lookUp,
-            SensorPaths, instances.failure(failed), instances.exit()})));
+        ElementsAreArray(sequence({instances.entry(), builtWithoutSensors, counted(), lookUp,
+            sensorPaths, instances.failure(failed), instances.exit()})));
     const HandlerLines paths = request("ReferenceNames");
     EXPECT_THAT(traceOf([&] { referenceNames(source); }),
-        ElementsAreArray(sequence({paths.entry(), BuiltWithoutSensors, counted(), lookUp,
-            SensorPaths, paths.failure(failed), paths.exit()})));
+        ElementsAreArray(sequence({paths.entry(), builtWithoutSensors, counted(), lookUp,
+            sensorPaths, paths.failure(failed), paths.exit()})));
 }
 
 TEST_F(SystemDeviceTraceTest, OfReferences)
@@ -222,10 +222,10 @@ TEST_F(SystemDeviceTraceTest, OfReferences)
     const HandlerLines instances = request("References");
     EXPECT_THAT(traceOf([&] { references(source, {.resultClass = "not passed on"}); }),
         ElementsAreArray(
-            sequence({instances.entry(), Built, counted(), lookUp, instances.exit()})));
+            sequence({instances.entry(), builtLines, counted(), lookUp, instances.exit()})));
     const HandlerLines names = request("ReferenceNames");
     EXPECT_THAT(traceOf([&] { referenceNames(source, {.resultClass = "not passed on"}); }),
-        ElementsAreArray(sequence({names.entry(), Built, counted(), lookUp, names.exit()})));
+        ElementsAreArray(sequence({names.entry(), builtLines, counted(), lookUp, names.exit()})));
 }
 
 TEST_F(SystemDeviceTraceTest, OfARefusedUpcallHasNoExitMark)
@@ -233,7 +233,7 @@ TEST_F(SystemDeviceTraceTest, OfARefusedUpcallHasNoExitMark)
     systems_.refusal = CMPI_RC_ERR_ACCESS_DENIED;
     const Host::ObjectPath& source = sensor("B:/2");
     const auto expected = [](const std::string& name) {
-        return sequence({request(name).entry(), request(name).failure(UpcallFailed)});
+        return sequence({request(name).entry(), request(name).failure(upcallFailed)});
     };
     EXPECT_EQ(ownLines(traceOf([&] { associators(source); })), expected("Associators"));
     EXPECT_EQ(ownLines(traceOf([&] { associatorNames(source); })), expected("AssociatorNames"));

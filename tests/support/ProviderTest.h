@@ -34,12 +34,12 @@ inline std::string textOf(const CMPIString* string)
 
 class ProviderTest : public ::testing::Test {
 protected:
-    static constexpr const char* NameSpace = "root/cimv2";
+    static constexpr const char* testNameSpace = "root/cimv2";
 
     // Returns a path with text keys; by default in the namespace of the requests.
     Host::ObjectPath& path(const char* className,
         const std::vector<std::pair<std::string, std::string>>& keys = {},
-        const char* nameSpace = NameSpace)
+        const char* nameSpace = testNameSpace)
     {
         Host::ObjectPath& made = request_->makePath(nameSpace, className);
         for (const auto& [name, text] : keys)

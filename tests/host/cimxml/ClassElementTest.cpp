@@ -24,7 +24,7 @@ protected:
     {
         std::string out;
         Host::CimXml::writeQualifierDeclaration(
-            out, *repository->findQualifier(Testing::NameSpace, name));
+            out, *repository->findQualifier(Testing::testNameSpace, name));
         return out;
     }
 };

@@ -17,37 +17,41 @@ using testing::StartsWith;
 
 class OperationTest : public CimXmlTest {};
 
-const std::string Instance = parameter("InstanceName", thing());
-const std::string Object = parameter("ObjectName", thing());
-const std::string Gauge = classOf("ClassName", "gauge");
-const std::string Filters = valueOf("Role", "Owner") + classOf("ResultClass", "single");
-const std::string MoreFilters = valueOf("ResultRole", "Part") + classOf("AssocClass", "LINK");
+const std::string instanceParameter = parameter("InstanceName", thing());
+const std::string objectParameter = parameter("ObjectName", thing());
+const std::string gaugeParameter = classOf("ClassName", "gauge");
+const std::string filterParameters = valueOf("Role", "Owner") + classOf("ResultClass", "single");
+const std::string moreFilters = valueOf("ResultRole", "Part") + classOf("AssocClass", "LINK");
 
 TEST_F(OperationTest, TakesEveryOperationWithWhatItNeeds)
 {
     const std::string pull = valueOf("EnumerationContext", "c") + valueOf("MaxObjectCount", "9");
     const std::vector<std::tuple<std::string, std::string, OperationKind>> operations = {
-        {"GetInstance", Instance, OperationKind::getInstance},
-        {"EnumerateInstances", Gauge, OperationKind::enumerateInstances},
-        {"EnumerateInstanceNames", Gauge, OperationKind::enumerateInstanceNames},
-        {"Associators", Object + Filters + MoreFilters, OperationKind::associators},
-        {"AssociatorNames", Object + Filters + MoreFilters, OperationKind::associatorNames},
-        {"References", Object + Filters, OperationKind::references},
-        {"ReferenceNames", Object + Filters, OperationKind::referenceNames},
-        {"GetClass", Gauge, OperationKind::getClass},
+        {"GetInstance", instanceParameter, OperationKind::getInstance},
+        {"EnumerateInstances", gaugeParameter, OperationKind::enumerateInstances},
+        {"EnumerateInstanceNames", gaugeParameter, OperationKind::enumerateInstanceNames},
+        {"Associators", objectParameter + filterParameters + moreFilters,
+            OperationKind::associators},
+        {"AssociatorNames", objectParameter + filterParameters + moreFilters,
+            OperationKind::associatorNames},
+        {"References", objectParameter + filterParameters, OperationKind::references},
+        {"ReferenceNames", objectParameter + filterParameters, OperationKind::referenceNames},
+        {"GetClass", gaugeParameter, OperationKind::getClass},
         {"EnumerateClasses", "", OperationKind::enumerateClasses},
-        {"EnumerateClassNames", Gauge, OperationKind::enumerateClassNames},
-        {"GetProperty", Instance + valueOf("PropertyName", "Label"), OperationKind::getProperty},
+        {"EnumerateClassNames", gaugeParameter, OperationKind::enumerateClassNames},
+        {"GetProperty", instanceParameter + valueOf("PropertyName", "Label"),
+            OperationKind::getProperty},
         {"GetQualifier", valueOf("QualifierName", "Key"), OperationKind::getQualifier},
         {"EnumerateQualifiers", "", OperationKind::enumerateQualifiers},
-        {"OpenEnumerateInstances", Gauge, OperationKind::openEnumerateInstances},
-        {"OpenEnumerateInstancePaths", Gauge, OperationKind::openEnumerateInstancePaths},
-        {"OpenAssociatorInstances", Instance + Filters + MoreFilters,
+        {"OpenEnumerateInstances", gaugeParameter, OperationKind::openEnumerateInstances},
+        {"OpenEnumerateInstancePaths", gaugeParameter, OperationKind::openEnumerateInstancePaths},
+        {"OpenAssociatorInstances", instanceParameter + filterParameters + moreFilters,
             OperationKind::openAssociatorInstances},
-        {"OpenAssociatorInstancePaths", Instance + Filters + MoreFilters,
+        {"OpenAssociatorInstancePaths", instanceParameter + filterParameters + moreFilters,
             OperationKind::openAssociatorInstancePaths},
-        {"OpenReferenceInstances", Instance + Filters, OperationKind::openReferenceInstances},
-        {"OpenReferenceInstancePaths", Instance + Filters,
+        {"OpenReferenceInstances", instanceParameter + filterParameters,
+            OperationKind::openReferenceInstances},
+        {"OpenReferenceInstancePaths", instanceParameter + filterParameters,
             OperationKind::openReferenceInstancePaths},
         {"PullInstancesWithPath", pull, OperationKind::pullInstancesWithPath},
         {"PullInstancePaths", pull, OperationKind::pullInstancePaths},
@@ -67,17 +71,17 @@ TEST_F(OperationTest, TakesEveryOperationWithWhatItNeeds)
 
 TEST_F(OperationTest, DefaultsAreThoseOfTheOperation)
 {
-    const auto get = read(call("GetInstance", Instance));
+    const auto get = read(call("GetInstance", instanceParameter));
     EXPECT_TRUE(get.selection.localOnly);
     EXPECT_FALSE(get.selection.includeQualifiers);
     EXPECT_EQ(get.selection.properties, std::nullopt);
-    const auto enumerate = read(call("EnumerateInstances", Gauge));
+    const auto enumerate = read(call("EnumerateInstances", gaugeParameter));
     EXPECT_TRUE(enumerate.selection.localOnly && enumerate.deepInheritance);
     const auto classes = read(call("EnumerateClasses"));
     EXPECT_TRUE(classes.selection.localOnly && classes.selection.includeQualifiers);
     EXPECT_FALSE(classes.deepInheritance);
     EXPECT_EQ(classes.className, "");
-    const auto open = read(call("OpenEnumerateInstances", Gauge));
+    const auto open = read(call("OpenEnumerateInstances", gaugeParameter));
     EXPECT_TRUE(open.deepInheritance);
     EXPECT_FALSE(open.selection.localOnly || open.continueOnError);
     EXPECT_EQ(open.operationTimeout, std::nullopt);
@@ -86,33 +90,34 @@ TEST_F(OperationTest, DefaultsAreThoseOfTheOperation)
 
 TEST_F(OperationTest, ReadsFlagsInAnyLetterCase)
 {
-    const auto operation = read(call("getINSTANCE", Instance + valueOf("localonly", "FALSE") +
-                                                        valueOf("IncludeQualifiers", " TRUE ") +
-                                                        valueOf("IncludeClassOrigin", "true")));
+    const auto operation = read(call("getINSTANCE",
+        instanceParameter + valueOf("localonly", "FALSE") + valueOf("IncludeQualifiers", " TRUE ") +
+            valueOf("IncludeClassOrigin", "true")));
     EXPECT_FALSE(operation.selection.localOnly);
     EXPECT_TRUE(operation.selection.includeQualifiers);
     EXPECT_TRUE(operation.selection.includeClassOrigin);
-    EXPECT_EQ(refusalOf(call("GetInstance", Instance + valueOf("LocalOnly", "1"))),
+    EXPECT_EQ(refusalOf(call("GetInstance", instanceParameter + valueOf("LocalOnly", "1"))),
         "4 parameter LocalOnly: \"1\" is no value of type boolean");
 }
 
 TEST_F(OperationTest, AnEmptyPropertyListIsOtherThanNone)
 {
     const auto listOf = [this](const std::string& list) {
-        return read(call("GetInstance", Instance + list)).selection.properties;
+        return read(call("GetInstance", instanceParameter + list)).selection.properties;
     };
     EXPECT_EQ(listOf("<IPARAMVALUE NAME='PropertyList'/>"), std::nullopt);
     EXPECT_THAT(listOf(parameter("PropertyList", "<VALUE.ARRAY/>")), Optional(IsEmpty()));
     EXPECT_THAT(listOf(parameter("PropertyList", "\n<VALUE.ARRAY> <VALUE>a</VALUE>"
                                                  "<VALUE>B</VALUE></VALUE.ARRAY>\n")),
         Optional(ElementsAre("a", "B")));
-    EXPECT_EQ(refusalOf(call("GetInstance", Instance + valueOf("PropertyList", "a"))),
+    EXPECT_EQ(refusalOf(call("GetInstance", instanceParameter + valueOf("PropertyList", "a"))),
         "4 parameter PropertyList must be a VALUE.ARRAY, not a VALUE");
 }
 
 TEST_F(OperationTest, ReadsAssociationFiltersAsDeclared)
 {
-    const auto operation = read(call("Associators", Object + Filters + MoreFilters));
+    const auto operation =
+        read(call("Associators", objectParameter + filterParameters + moreFilters));
     EXPECT_EQ(operation.associationClass, "Link");
     EXPECT_EQ(operation.resultClass, "Single");
     EXPECT_EQ(operation.role, "Owner");
@@ -120,7 +125,8 @@ TEST_F(OperationTest, ReadsAssociationFiltersAsDeclared)
     EXPECT_EQ(operation.className, "Thing");
     EXPECT_EQ(operation.path->toText(), "root/test:Thing.Name=\"a\",Index=7");
     EXPECT_EQ(
-        read(call("AssociatorNames", Object + classOf("AssocClass", ""))).associationClass, "");
+        read(call("AssociatorNames", objectParameter + classOf("AssocClass", ""))).associationClass,
+        "");
 }
 
 TEST_F(OperationTest, TakesAClassAsTheSourceOfAssociations)
@@ -133,7 +139,7 @@ TEST_F(OperationTest, TakesAClassAsTheSourceOfAssociations)
 TEST_F(OperationTest, ReadsWhatEnumerationsAreOpenedWith)
 {
     const auto operation = read(call("OpenEnumerateInstances",
-        Gauge + valueOf("FilterQuery", "q") + valueOf("FilterQueryLanguage", "DMTF:FQL") +
+        gaugeParameter + valueOf("FilterQuery", "q") + valueOf("FilterQueryLanguage", "DMTF:FQL") +
             valueOf("OperationTimeout", "30") + valueOf("ContinueOnError", "true") +
             valueOf("MaxObjectCount", "1000")));
     EXPECT_EQ(operation.filterQuery, "q");
@@ -151,7 +157,7 @@ TEST_F(OperationTest, NamesTheParameterThatIsWrong)
     EXPECT_EQ(refusalOf(call("GetInstance")), "4 GetInstance needs parameter InstanceName");
     EXPECT_EQ(refusalOf(call("GetInstance", "<IPARAMVALUE NAME='InstanceName'/>")),
         "4 GetInstance needs parameter InstanceName");
-    EXPECT_EQ(refusalOf(call("GetInstance", Instance + Instance)),
+    EXPECT_EQ(refusalOf(call("GetInstance", instanceParameter + instanceParameter)),
         "4 parameter InstanceName comes twice");
     EXPECT_EQ(refusalOf(call("EnumerateInstances", classOf("ClassName", ""))),
         "4 EnumerateInstances needs parameter ClassName");

@@ -18,11 +18,11 @@ std::string replaced(std::string text, const std::string& from, const std::strin
     return text.replace(at, from.size(), to);
 }
 
-const std::string Good = call("EnumerateQualifiers");
+const std::string goodCall = call("EnumerateQualifiers");
 
 TEST(OutcomeTest, ReadsWhatTheMessageSays)
 {
-    const Message message(Good);
+    const Message message(goodCall);
     EXPECT_EQ(message.id(), "4711");
     EXPECT_EQ(message.protocolVersion(), "1.0");
     EXPECT_EQ(message.methodName(), "EnumerateQualifiers");
@@ -32,10 +32,11 @@ TEST(OutcomeTest, ReadsWhatTheMessageSays)
 
 TEST(OutcomeTest, PassesOverWhatTheProtocolDoesNotKnow)
 {
+    EXPECT_EQ(outcomeOf(replaced(goodCall, "<SIMPLEREQ>", "<X-EXTRA>t</X-EXTRA><SIMPLEREQ Y='1'>")),
+        "read");
+    EXPECT_EQ(outcomeOf("\xEF\xBB\xBF" + goodCall), "read");
     EXPECT_EQ(
-        outcomeOf(replaced(Good, "<SIMPLEREQ>", "<X-EXTRA>t</X-EXTRA><SIMPLEREQ Y='1'>")), "read");
-    EXPECT_EQ(outcomeOf("\xEF\xBB\xBF" + Good), "read");
-    EXPECT_EQ(outcomeOf(replaced(Good, "<SIMPLEREQ>", "<!-- c --><?pi x?> <SIMPLEREQ>")), "read");
+        outcomeOf(replaced(goodCall, "<SIMPLEREQ>", "<!-- c --><?pi x?> <SIMPLEREQ>")), "read");
 }
 
 TEST(OutcomeTest, RefusesWhatIsNotWellFormed)
@@ -57,7 +58,7 @@ TEST(OutcomeTest, RefusesUtf16WhicheverEndComesFirst)
 {
     std::string big;
     std::string little;
-    for (const char c : Good) {
+    for (const char c : goodCall) {
         big.append({'\0', c});
         little.append({c, '\0'});
     }
@@ -76,13 +77,13 @@ TEST(OutcomeTest, RefusesDocumentTypesAndEntities)
 
 TEST(OutcomeTest, RefusesVersionsOfAnotherKind)
 {
-    EXPECT_EQ(outcomeOf(replaced(Good, "CIMVERSION=\"2.0", "CIMVERSION=\"3.0")),
+    EXPECT_EQ(outcomeOf(replaced(goodCall, "CIMVERSION=\"2.0", "CIMVERSION=\"3.0")),
         "unsupported-cim-version");
-    EXPECT_EQ(outcomeOf(replaced(Good, "DTDVERSION=\"2.0", "DTDVERSION=\"20")),
+    EXPECT_EQ(outcomeOf(replaced(goodCall, "DTDVERSION=\"2.0", "DTDVERSION=\"20")),
         "unsupported-dtd-version");
-    EXPECT_EQ(outcomeOf(replaced(Good, "PROTOCOLVERSION=\"1.0", "PROTOCOLVERSION=\"2.0")),
+    EXPECT_EQ(outcomeOf(replaced(goodCall, "PROTOCOLVERSION=\"1.0", "PROTOCOLVERSION=\"2.0")),
         "unsupported-protocol-version");
-    EXPECT_EQ(outcomeOf(replaced(replaced(Good, "DTDVERSION=\"2.0", "DTDVERSION=\"2.4"),
+    EXPECT_EQ(outcomeOf(replaced(replaced(goodCall, "DTDVERSION=\"2.0", "DTDVERSION=\"2.4"),
                   "PROTOCOLVERSION=\"1.0", "PROTOCOLVERSION=\"1.4")),
         "read");
 }
@@ -91,7 +92,7 @@ TEST(OutcomeTest, RefusesWhatLacksSomething)
 {
     for (const std::string part : {" CIMVERSION=\"2.0\"", " DTDVERSION=\"2.0\"", " ID=\"4711\"",
              " PROTOCOLVERSION=\"1.0\"", " NAME=\"EnumerateQualifiers\"", " NAME=\"root\""})
-        EXPECT_EQ(outcomeOf(replaced(Good, part, "")), "request-not-loosely-valid") << part;
+        EXPECT_EQ(outcomeOf(replaced(goodCall, part, "")), "request-not-loosely-valid") << part;
     EXPECT_EQ(outcomeOf("<XML/>"), "request-not-loosely-valid");
     EXPECT_EQ(outcomeOf(withHead("")), "request-not-loosely-valid");
     EXPECT_EQ(outcomeOf(withHead("<SIMPLEREQ/>")), "request-not-loosely-valid");
@@ -109,9 +110,9 @@ TEST(OutcomeTest, RefusesSeveralRequestsAndWhatIsNone)
     EXPECT_EQ(outcomeOf(withHead("<SIMPLERSP/>")), "request-not-valid");
     EXPECT_EQ(outcomeOf("<CIM CIMVERSION='2.0' DTDVERSION='2.0'><DECLARATION/></CIM>"),
         "request-not-valid");
-    const auto begin = Good.find("<IMETHODCALL");
-    const std::string again = Good.substr(begin, Good.find("</SIMPLEREQ>") - begin);
-    EXPECT_EQ(outcomeOf(replaced(Good, "</SIMPLEREQ>", again + "</SIMPLEREQ>")),
+    const auto begin = goodCall.find("<IMETHODCALL");
+    const std::string again = goodCall.substr(begin, goodCall.find("</SIMPLEREQ>") - begin);
+    EXPECT_EQ(outcomeOf(replaced(goodCall, "</SIMPLEREQ>", again + "</SIMPLEREQ>")),
         "request-not-loosely-valid");
 }
 
@@ -120,7 +121,7 @@ TEST(OutcomeTest, SaysWhatIsWrongAndWhere)
     EXPECT_EQ(errorOf("<CIM>\n<A>\n</B></CIM>"), "line 3, byte 12: mismatched tag");
     EXPECT_EQ(errorOf("<CIM\nCIMVERSION='2.0'/>"),
         "line 1, byte 1: CIM: there is no attribute DTDVERSION");
-    EXPECT_THAT(errorOf(replaced(Good, "<SIMPLEREQ>", "<MULTIREQ/><SIMPLEREQ>")),
+    EXPECT_THAT(errorOf(replaced(goodCall, "<SIMPLEREQ>", "<MULTIREQ/><SIMPLEREQ>")),
         HasSubstr("line 2, byte"));
 }
 
@@ -142,7 +143,7 @@ TEST(OutcomeTest, BoundsDepthElementsAndAttributes)
     EXPECT_EQ(outcomeOf(attributes + "/>"), "request-not-valid");
 
     const std::string huge(8'000'000, 'x');
-    EXPECT_EQ(outcomeOf(replaced(Good, "ID=\"", "ID=\"" + huge)), "read");
+    EXPECT_EQ(outcomeOf(replaced(goodCall, "ID=\"", "ID=\"" + huge)), "read");
     EXPECT_EQ(outcomeOf("<A b='" + huge), "request-not-well-formed");
     EXPECT_LT(errorOf("<A><" + huge + "></A></A>").size(), 500U);
 }

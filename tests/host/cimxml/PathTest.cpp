@@ -33,7 +33,7 @@ protected:
     }
 };
 
-constexpr const char* At = "20260102030405.000006+060";
+constexpr const char* dateTime = "20260102030405.000006+060";
 
 TEST_F(PathTest, TypesKeysAsTheClassDeclaresThem)
 {
@@ -41,8 +41,8 @@ TEST_F(PathTest, TypesKeysAsTheClassDeclaresThem)
     EXPECT_EQ(operation.path->toText(), "root/test:Thing.Name=\"a\",Index=7");
     EXPECT_EQ(operation.path->key("Index")->type(), CMPI_uint16);
     EXPECT_EQ(operation.path->key("Name")->type(), CMPI_string);
-    EXPECT_EQ(pathText(flag("tRuE", " -0x80 ", At)),
-        "root/test:Flag.On=TRUE,Level=-128,At=\"" + std::string(At) + "\"");
+    EXPECT_EQ(pathText(flag("tRuE", " -0x80 ", dateTime)),
+        "root/test:Flag.On=TRUE,Level=-128,At=\"" + std::string(dateTime) + "\"");
 }
 
 TEST_F(PathTest, SpellsNamesAsTheyAreDeclared)
@@ -81,9 +81,11 @@ TEST_F(PathTest, NamesTheKeyWhoseValueDoesNotFit)
         EXPECT_THAT(pathRefusal(instanceName("Thing", binding("Index", text))),
             testing::StartsWith("4 key \"Index\": "))
             << text;
-    EXPECT_THAT(pathRefusal(flag("yes", "1", At)), testing::StartsWith("4 key \"On\": "));
-    EXPECT_THAT(pathRefusal(flag("true", "128", At)), testing::StartsWith("4 key \"Level\": "));
-    EXPECT_THAT(pathRefusal(flag("true", "-129", At)), testing::StartsWith("4 key \"Level\": "));
+    EXPECT_THAT(pathRefusal(flag("yes", "1", dateTime)), testing::StartsWith("4 key \"On\": "));
+    EXPECT_THAT(
+        pathRefusal(flag("true", "128", dateTime)), testing::StartsWith("4 key \"Level\": "));
+    EXPECT_THAT(
+        pathRefusal(flag("true", "-129", dateTime)), testing::StartsWith("4 key \"Level\": "));
     EXPECT_THAT(pathRefusal(flag("true", "1", "now")), testing::StartsWith("4 key \"At\": "));
 }
 
@@ -174,9 +176,10 @@ TEST_F(PathTest, ReadsWhatItWroteAsTheSame)
         "<KEYBINDING NAME='Part'><VALUE.REFERENCE>" +
         instanceName("Single", binding("InstanceID", "&lt;&quot;&apos;&gt; ")) +
         "</VALUE.REFERENCE></KEYBINDING>";
-    for (const std::string& name : {thing(), flag("false", "-7", At), instanceName("Link", part),
-             keyOf("VALUETYPE='numeric'", "-3"), keyOf("VALUETYPE='boolean'", "true"),
-             keyOf("VALUETYPE='numeric'", "1e300"), instanceName("Single", "")}) {
+    for (const std::string& name :
+        {thing(), flag("false", "-7", dateTime), instanceName("Link", part),
+            keyOf("VALUETYPE='numeric'", "-3"), keyOf("VALUETYPE='boolean'", "true"),
+            keyOf("VALUETYPE='numeric'", "1e300"), instanceName("Single", "")}) {
         const auto* const path = read(call("GetInstance", parameter("InstanceName", name))).path;
         std::string written;
         Host::CimXml::writeInstanceName(written, *path);

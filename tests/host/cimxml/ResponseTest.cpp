@@ -19,22 +19,22 @@ using Host::CimXml::OperationKind;
 using Host::CimXml::ResponseWriter;
 using testing::HasSubstr;
 
-const std::string Head = R"(<?xml version="1.0" encoding="utf-8"?>)"
+const std::string head = R"(<?xml version="1.0" encoding="utf-8"?>)"
                          "\n"
                          R"(<CIM CIMVERSION="2.0" DTDVERSION="2.0"><MESSAGE ID="4711" )"
                          R"(PROTOCOLVERSION="1.0"><SIMPLERSP><IMETHODRESPONSE NAME=")";
-const std::string Tail = "</IMETHODRESPONSE></SIMPLERSP></MESSAGE></CIM>\n";
-const std::string NameXml =
+const std::string tail = "</IMETHODRESPONSE></SIMPLERSP></MESSAGE></CIM>\n";
+const std::string nameXml =
     R"(<INSTANCENAME CLASSNAME="Thing"><KEYBINDING NAME="Name"><KEYVALUE VALUETYPE="string">a)"
     R"(</KEYVALUE></KEYBINDING><KEYBINDING NAME="Index"><KEYVALUE VALUETYPE="numeric">7)"
     R"(</KEYVALUE></KEYBINDING></INSTANCENAME>)";
-const std::string InstanceXml =
+const std::string instanceXml =
     R"(<INSTANCE CLASSNAME="Thing"><PROPERTY NAME="Name" TYPE="string"><VALUE>a</VALUE></PROPERTY>)"
     R"(<PROPERTY NAME="Index" TYPE="uint16"><VALUE>7</VALUE></PROPERTY></INSTANCE>)";
-const std::string NameSpaceXml =
+const std::string nameSpaceXml =
     R"(<NAMESPACEPATH><HOST>box</HOST><LOCALNAMESPACEPATH><NAMESPACE NAME="root"></NAMESPACE>)"
     R"(<NAMESPACE NAME="test"></NAMESPACE></LOCALNAMESPACEPATH></NAMESPACEPATH>)";
-const std::string PathXml = "<INSTANCEPATH>" + NameSpaceXml + NameXml + "</INSTANCEPATH>";
+const std::string pathXml = "<INSTANCEPATH>" + nameSpaceXml + nameXml + "</INSTANCEPATH>";
 
 class ResponseTest : public CimXmlTest {
 protected:
@@ -44,7 +44,7 @@ protected:
         const std::string& name, OperationKind kind, const AppendObjects& appendObjects)
     {
         ResponseWriter writer(
-            Message(call(name)), kind, *repository, {"box", Testing::NameSpace}, {});
+            Message(call(name)), kind, *repository, {"box", Testing::testNameSpace}, {});
         std::string out;
         writer.begin(out);
         appendObjects(writer, out);
@@ -79,11 +79,11 @@ protected:
 
     Host::Instance& emptyInstance(const char* className = "Thing")
     {
-        return request.makeInstance(request.makePath(Testing::NameSpace, className));
+        return request.makeInstance(request.makePath(Testing::testNameSpace, className));
     }
     Host::ObjectPath& path()
     {
-        Host::ObjectPath& made = request.makePath(Testing::NameSpace, "Thing");
+        Host::ObjectPath& made = request.makePath(Testing::testNameSpace, "Thing");
         made.addKey("Name", Value::text(request.arena(), "a"));
         made.addKey("Index", Value::integer(CMPI_uint16, 7));
         return made;
@@ -106,7 +106,7 @@ protected:
     {
         return valueXml(Value::text(request.arena(), text));
     }
-    static std::string instanceXml(const Host::Instance& instance,
+    static std::string markupOf(const Host::Instance& instance,
         const Host::ClassDeclaration* declared = nullptr,
         const Host::CimXml::ObjectSelection& selection = {})
     {
@@ -118,16 +118,16 @@ protected:
 
 TEST_F(ResponseTest, WrapsInstancesAsTheOperationDoes)
 {
-    EXPECT_EQ(instanceBy(OperationKind::getInstance), InstanceXml);
+    EXPECT_EQ(instanceBy(OperationKind::getInstance), instanceXml);
     EXPECT_EQ(instanceBy(OperationKind::enumerateInstances),
-        "<VALUE.NAMEDINSTANCE>" + NameXml + InstanceXml + "</VALUE.NAMEDINSTANCE>");
+        "<VALUE.NAMEDINSTANCE>" + nameXml + instanceXml + "</VALUE.NAMEDINSTANCE>");
     for (const auto kind : {OperationKind::associators, OperationKind::references})
         EXPECT_EQ(instanceBy(kind),
-            "<VALUE.OBJECTWITHPATH>" + PathXml + InstanceXml + "</VALUE.OBJECTWITHPATH>");
+            "<VALUE.OBJECTWITHPATH>" + pathXml + instanceXml + "</VALUE.OBJECTWITHPATH>");
     for (const auto kind :
         {OperationKind::openEnumerateInstances, OperationKind::pullInstancesWithPath})
         EXPECT_EQ(instanceBy(kind),
-            "<VALUE.INSTANCEWITHPATH>" + PathXml + InstanceXml + "</VALUE.INSTANCEWITHPATH>");
+            "<VALUE.INSTANCEWITHPATH>" + pathXml + instanceXml + "</VALUE.INSTANCEWITHPATH>");
 }
 
 TEST_F(ResponseTest, WritesAnInstanceTheSameWhateverWasWrittenBefore)
@@ -159,20 +159,20 @@ TEST_F(ResponseTest, WritesAnInstanceTheSameWhateverWasWrittenBefore)
         for (const Host::Instance* const each : instances) {
             std::string out;
             writer.write(out, *each, declared);
-            EXPECT_EQ(out, instanceXml(*each, declared, selection));
+            EXPECT_EQ(out, markupOf(*each, declared, selection));
         }
 }
 
 TEST_F(ResponseTest, WrapsPathsAndClassNamesAsTheOperationDoes)
 {
-    EXPECT_EQ(pathBy(OperationKind::enumerateInstanceNames), NameXml);
-    EXPECT_EQ(pathBy(OperationKind::associatorNames), "<OBJECTPATH>" + PathXml + "</OBJECTPATH>");
-    EXPECT_EQ(pathBy(OperationKind::referenceNames), "<OBJECTPATH>" + PathXml + "</OBJECTPATH>");
-    EXPECT_EQ(pathBy(OperationKind::pullInstancePaths), PathXml);
+    EXPECT_EQ(pathBy(OperationKind::enumerateInstanceNames), nameXml);
+    EXPECT_EQ(pathBy(OperationKind::associatorNames), "<OBJECTPATH>" + pathXml + "</OBJECTPATH>");
+    EXPECT_EQ(pathBy(OperationKind::referenceNames), "<OBJECTPATH>" + pathXml + "</OBJECTPATH>");
+    EXPECT_EQ(pathBy(OperationKind::pullInstancePaths), pathXml);
     const std::string name = "<CLASSNAME NAME=\"Thing\"></CLASSNAME>";
     EXPECT_EQ(classNameBy(OperationKind::enumerateClassNames), name);
     EXPECT_EQ(classNameBy(OperationKind::associatorNames),
-        "<OBJECTPATH><CLASSPATH>" + NameSpaceXml + name + "</CLASSPATH></OBJECTPATH>");
+        "<OBJECTPATH><CLASSPATH>" + nameSpaceXml + name + "</CLASSPATH></OBJECTPATH>");
 }
 
 TEST_F(ResponseTest, WritesClassesAndQualifiers)
@@ -186,13 +186,13 @@ TEST_F(ResponseTest, WritesClassesAndQualifiers)
         R"(<CLASS NAME="Single"><PROPERTY NAME="InstanceID" TYPE="string"></PROPERTY></CLASS>)";
     EXPECT_EQ(single(OperationKind::enumerateClasses), declared);
     EXPECT_EQ(single(OperationKind::associators),
-        "<VALUE.OBJECTWITHPATH><CLASSPATH>" + NameSpaceXml +
+        "<VALUE.OBJECTWITHPATH><CLASSPATH>" + nameSpaceXml +
             "<CLASSNAME NAME=\"Single\"></CLASSNAME></CLASSPATH>" + declared +
             "</VALUE.OBJECTWITHPATH>");
-    const std::string key =
-        result(OperationKind::getQualifier, [this](ResponseWriter& writer, std::string& out) {
-            writer.qualifierDeclaration(out, *repository->findQualifier(Testing::NameSpace, "Key"));
-        });
+    const std::string key = result(OperationKind::getQualifier, [this](ResponseWriter& writer,
+                                                                    std::string& out) {
+        writer.qualifierDeclaration(out, *repository->findQualifier(Testing::testNameSpace, "Key"));
+    });
     EXPECT_THAT(key, testing::StartsWith("<QUALIFIER.DECLARATION NAME=\"Key\""));
 }
 
@@ -203,9 +203,9 @@ TEST_F(ResponseTest, WithoutObjectsTheReturnValueIsEmptyOrLeftOut)
             name, kind, [](ResponseWriter& writer, std::string& out) { writer.finish(out); });
     };
     EXPECT_EQ(empty("EnumerateInstances", OperationKind::enumerateInstances),
-        Head + "EnumerateInstances\"><IRETURNVALUE></IRETURNVALUE>" + Tail);
+        head + "EnumerateInstances\"><IRETURNVALUE></IRETURNVALUE>" + tail);
     EXPECT_EQ(empty("CloseEnumeration", OperationKind::closeEnumeration),
-        Head + "CloseEnumeration\">" + Tail);
+        head + "CloseEnumeration\">" + tail);
 }
 
 TEST_F(ResponseTest, SaysWhetherAnEnumerationGoesOn)
@@ -215,12 +215,12 @@ TEST_F(ResponseTest, SaysWhetherAnEnumerationGoesOn)
             [&](ResponseWriter& writer, std::string& out) { writer.finish(out, context); });
     };
     const auto expected = [](const std::string& ended, const std::string& context) {
-        return Head +
+        return head +
                R"(PullInstancePaths"><IRETURNVALUE></IRETURNVALUE>)"
                R"(<PARAMVALUE NAME="EndOfSequence" PARAMTYPE="boolean"><VALUE>)" +
                ended +
                R"(</VALUE></PARAMVALUE><PARAMVALUE NAME="EnumerationContext" PARAMTYPE="string">)" +
-               "<VALUE>" + context + "</VALUE></PARAMVALUE>" + Tail;
+               "<VALUE>" + context + "</VALUE></PARAMVALUE>" + tail;
     };
     EXPECT_EQ(pulled("c&1"), expected("FALSE", "c&amp;1"));
     EXPECT_EQ(pulled(std::nullopt), expected("TRUE", ""));
@@ -229,8 +229,8 @@ TEST_F(ResponseTest, SaysWhetherAnEnumerationGoesOn)
 TEST_F(ResponseTest, TellsFailuresWithCodeAndText)
 {
     EXPECT_EQ(errorResponse(Message(call("GetInstance")), CMPI_RC_ERR_NOT_FOUND, "no \"x\" <here>"),
-        Head + R"(GetInstance"><ERROR CODE="6" DESCRIPTION="no &quot;x&quot; &lt;here&gt;">)" +
-            "</ERROR>" + Tail);
+        head + R"(GetInstance"><ERROR CODE="6" DESCRIPTION="no &quot;x&quot; &lt;here&gt;">)" +
+            "</ERROR>" + tail);
 }
 
 TEST_F(ResponseTest, WritesTheValueOfAProperty)
@@ -285,7 +285,7 @@ TEST_F(ResponseTest, LeavesNullsInArraysOut)
     array.set(2, Value::integer(CMPI_uint8, 3));
     Host::Instance& made = emptyInstance();
     made.setProperty("L", Value::of(array));
-    EXPECT_EQ(instanceXml(made),
+    EXPECT_EQ(markupOf(made),
         R"(<INSTANCE CLASSNAME="Thing"><PROPERTY.ARRAY NAME="L" TYPE="uint8"><VALUE.ARRAY>)"
         R"(<VALUE>1</VALUE><VALUE>3</VALUE></VALUE.ARRAY></PROPERTY.ARRAY></INSTANCE>)");
 }
@@ -297,12 +297,12 @@ TEST_F(ResponseTest, TakesFromTheClassWhatAValueDoesNotSay)
     made.setProperty("Levels", Value());
     made.setProperty("Percent", Value::null(CMPI_uint8));
     Host::CimXml::ObjectSelection selection;
-    EXPECT_EQ(instanceXml(made, &declared),
+    EXPECT_EQ(markupOf(made, &declared),
         R"(<INSTANCE CLASSNAME="Gauge"><PROPERTY.ARRAY NAME="Levels" TYPE="sint32">)"
         R"(</PROPERTY.ARRAY><PROPERTY NAME="Percent" TYPE="uint8"></PROPERTY></INSTANCE>)");
     selection.includeClassOrigin = true;
     selection.properties = {"LEVELS"};
-    EXPECT_EQ(instanceXml(made, &declared, selection),
+    EXPECT_EQ(markupOf(made, &declared, selection),
         R"(<INSTANCE CLASSNAME="Gauge"><PROPERTY.ARRAY NAME="Levels" TYPE="sint32" )"
         R"(CLASSORIGIN="Thing" PROPAGATED="true"></PROPERTY.ARRAY></INSTANCE>)");
 }
@@ -316,11 +316,11 @@ TEST_F(ResponseTest, WritesANullForAListedPropertyThatTheInstanceLacks)
     selection.properties = {"percent", "LEVELS", "Unknown"};
     const std::string begin = R"(<INSTANCE CLASSNAME="Gauge"><PROPERTY NAME="Percent" )"
                               R"(TYPE="uint8"><VALUE>7</VALUE></PROPERTY>)";
-    EXPECT_EQ(instanceXml(made, &declared, selection), begin + "</INSTANCE>");
+    EXPECT_EQ(markupOf(made, &declared, selection), begin + "</INSTANCE>");
     selection.writesNulls = true;
-    EXPECT_EQ(instanceXml(made, &declared, selection),
+    EXPECT_EQ(markupOf(made, &declared, selection),
         begin + R"(<PROPERTY.ARRAY NAME="Levels" TYPE="sint32"></PROPERTY.ARRAY></INSTANCE>)");
-    EXPECT_EQ(instanceXml(made, nullptr, selection), begin + "</INSTANCE>");
+    EXPECT_EQ(markupOf(made, nullptr, selection), begin + "</INSTANCE>");
 }
 
 TEST_F(ResponseTest, WritesReferencesWithWhatTheyKnow)
@@ -332,14 +332,14 @@ TEST_F(ResponseTest, WritesReferencesWithWhatTheyKnow)
     const std::string begin = R"(<INSTANCE CLASSNAME="Link"><PROPERTY.REFERENCE NAME="Owner" )"
                               R"(REFERENCECLASS="Thing"><VALUE.REFERENCE>)";
     const std::string end = "</VALUE.REFERENCE></PROPERTY.REFERENCE></INSTANCE>";
-    EXPECT_EQ(instanceXml(made, &declared),
+    EXPECT_EQ(markupOf(made, &declared),
         begin + R"(<LOCALINSTANCEPATH><LOCALNAMESPACEPATH><NAMESPACE NAME="root"></NAMESPACE>)" +
-            R"(<NAMESPACE NAME="test"></NAMESPACE></LOCALNAMESPACEPATH>)" + NameXml +
+            R"(<NAMESPACE NAME="test"></NAMESPACE></LOCALNAMESPACEPATH>)" + nameXml +
             "</LOCALINSTANCEPATH>" + end);
     target.setHost("box");
-    EXPECT_EQ(instanceXml(made, &declared), begin + PathXml + end);
+    EXPECT_EQ(markupOf(made, &declared), begin + pathXml + end);
     target.setNameSpace(nullptr);
-    EXPECT_EQ(instanceXml(made, &declared), begin + NameXml + end);
+    EXPECT_EQ(markupOf(made, &declared), begin + nameXml + end);
 }
 
 TEST_F(ResponseTest, WritesEmbeddedInstancesAsText)
@@ -348,7 +348,7 @@ TEST_F(ResponseTest, WritesEmbeddedInstancesAsText)
     inner.setProperty("InstanceID", Value::text(request.arena(), "<"));
     Host::Instance& outer = emptyInstance();
     outer.setProperty("In", Value::of(inner));
-    EXPECT_EQ(instanceXml(outer),
+    EXPECT_EQ(markupOf(outer),
         R"(<INSTANCE CLASSNAME="Thing"><PROPERTY NAME="In" TYPE="string" EmbeddedObject="instance">)"
         R"(<VALUE>&lt;INSTANCE CLASSNAME=&quot;Single&quot;&gt;&lt;PROPERTY )"
         R"(NAME=&quot;InstanceID&quot; TYPE=&quot;string&quot;&gt;&lt;VALUE&gt;&amp;lt;&lt;/VALUE)"

@@ -14,7 +14,7 @@ namespace HttpTests {
 
 namespace {
 
-const std::filesystem::path Folder = SENSOR_PROFILE_SOURCE_DIR "/tests/data/http";
+const std::filesystem::path folder = SENSOR_PROFILE_SOURCE_DIR "/tests/data/http";
 
 // Removes the escape at the beginning of the text. Returns its byte.
 char takeEscape(std::string_view& text)
@@ -102,7 +102,7 @@ protected:
 
 TEST_P(RequestFilesTest, OutcomeIsTheExpectedOne)
 {
-    const std::string content = Testing::contentOf(Folder / (GetParam() + ".exchange"));
+    const std::string content = Testing::contentOf(folder / (GetParam() + ".exchange"));
     const std::string separator = "-- Answer:\n";
     const std::size_t requestEnd = content.find(separator);
     ASSERT_NE(requestEnd, content.npos);
@@ -113,7 +113,7 @@ TEST_P(RequestFilesTest, OutcomeIsTheExpectedOne)
 }
 
 INSTANTIATE_TEST_SUITE_P(
-    Files, RequestFilesTest, testing::ValuesIn(Testing::fileStemsIn(Folder)), [](const auto& file) {
+    Files, RequestFilesTest, testing::ValuesIn(Testing::fileStemsIn(folder)), [](const auto& file) {
         return Testing::replaced(Testing::replaced(file.param, "-", "_"), ".", "_");
     });
 

@@ -15,7 +15,7 @@ using ::testing::StartsWith;
 
 using Association = Host::Manager::Association;
 
-constexpr CMPIStatus Ok = {CMPI_RC_OK, nullptr};
+constexpr CMPIStatus ok = {CMPI_RC_OK, nullptr};
 
 class ManagerAssociationTest : public Testing::ManagerTest {
 protected:
@@ -113,7 +113,7 @@ TEST_F(ManagerAssociationTest, TheSourceKeepsItsKeysAndHasItsClassesRegisteredNa
     std::vector<std::string> seen;
     script("BoxLinks", [&](const ProviderCall& call) {
         seen.push_back(Host::ObjectPath::of(call.path)->toText());
-        return Ok;
+        return ok;
     });
     Host::ObjectPath& box = path("bOx");
     box.addKey("Name", Host::Value::text(request_->arena(), "b"));
@@ -131,7 +131,7 @@ TEST_F(ManagerAssociationTest, ResultsAreOfTheResultClassOrBelowIt)
     script("BoxLinks", [this](const ProviderCall& call) {
         for (const char* const each : {"Part", "SpecialPart", "Box", "Unheard"})
             deliver(call, each, "one");
-        return Ok;
+        return ok;
     });
     const auto found = [&](const char* resultClass, bool asNames) {
         const Association association = {"BoxLink", resultClass, nullptr, nullptr};
@@ -179,7 +179,7 @@ TEST_F(ManagerAssociationTest, AnAnswerOutlivesTheFailureOfAnotherProvider)
 
 TEST_F(ManagerAssociationTest, AFailureWithoutAnyAnswerIsPassedOn)
 {
-    script("ThingLinks", [](const ProviderCall&) { return Ok; });
+    script("ThingLinks", [](const ProviderCall&) { return ok; });
     script("BoxLinks", [&](const ProviderCall&) { return failure(CMPI_RC_ERR_FAILED, "broken"); });
     EXPECT_EQ(refusalOf([&] { manager_.references(context(), path("Box"), {}, nullptr); }),
         "code 1: broken");

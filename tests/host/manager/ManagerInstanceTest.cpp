@@ -12,7 +12,7 @@ using ::testing::IsEmpty;
 using Testing::ProviderCall;
 using Testing::refusalOf;
 
-constexpr CMPIStatus Ok = {CMPI_RC_OK, nullptr};
+constexpr CMPIStatus ok = {CMPI_RC_OK, nullptr};
 
 using ManagerInstanceTest = Testing::ManagerTest;
 
@@ -74,7 +74,7 @@ TEST_F(ManagerInstanceTest, AnInstanceIsOfItsOwnClassOnly)
 
 TEST_F(ManagerInstanceTest, AnAnswerWithoutInstanceIsNotFound)
 {
-    script("Boxes", [](const ProviderCall&) { return Ok; });
+    script("Boxes", [](const ProviderCall&) { return ok; });
     EXPECT_EQ(refusalOf([&] { manager_.getInstance(context(), path("Box"), nullptr); }),
         "code 6: there is no root/cimv2:Box");
 }
@@ -101,7 +101,7 @@ TEST_F(ManagerInstanceTest, AProviderMayChangeItsPathWithoutChangingTheCallers)
     });
     const Host::ObjectPath& box = path("Box");
     manager_.getInstance(context(), box, nullptr);
-    EXPECT_EQ(box.nameSpace(), Testing::NameSpace);
+    EXPECT_EQ(box.nameSpace(), Testing::testNameSpace);
 }
 
 TEST_F(ManagerInstanceTest, AProvidersErrorIsPassedOn)
@@ -149,7 +149,7 @@ TEST_F(ManagerInstanceTest, WhatIsNoObjectIsRefusedAndCounted)
 {
     script("Boxes", [](const ProviderCall& call) {
         EXPECT_NE(CMReturnInstance(call.result, nullptr).rc, CMPI_RC_OK);
-        return Ok;
+        return ok;
     });
     const auto found = manager_.enumerateInstances(context(), path("Box"), nullptr);
     EXPECT_EQ(found.refused(), 1U);
@@ -169,7 +169,7 @@ TEST_F(ManagerInstanceTest, WhatOneProviderFailsToAnswerTakesNothingFromTheOther
 
 TEST_F(ManagerInstanceTest, WhereNothingAtAllIsFoundTheFirstFailureIsTheAnswer)
 {
-    script("Boxes", [](const ProviderCall&) { return Ok; });
+    script("Boxes", [](const ProviderCall&) { return ok; });
     script("Parts", [&](const ProviderCall&) { return failure(CMPI_RC_ERR_FAILED, "first"); });
     script(
         "SpecialParts", [&](const ProviderCall&) { return failure(CMPI_RC_ERR_FAILED, "second"); });

@@ -29,7 +29,7 @@
 
 namespace Testing {
 
-inline constexpr const char* NameSpace = "root/cimv2";
+inline constexpr const char* testNameSpace = "root/cimv2";
 
 inline std::string orNone(const char* text)
 {
@@ -75,7 +75,7 @@ protected:
     // Delivers an object of a class, as an instance or as a path, according to the operation.
     CMPIStatus deliver(const ProviderCall& call, const char* className, const char* name)
     {
-        CMPIObjectPath* const path = CMNewObjectPath(broker(), NameSpace, className, nullptr);
+        CMPIObjectPath* const path = CMNewObjectPath(broker(), testNameSpace, className, nullptr);
         CMAddKey(path, "Name", name, CMPI_chars);
         const bool wantsNames = call.operation.find("Name") != std::string::npos;
         if (wantsNames)
@@ -99,7 +99,7 @@ protected:
 
     Host::ObjectPath& path(std::string_view className)
     {
-        return request_->makePath(NameSpace, className);
+        return request_->makePath(testNameSpace, className);
     }
 
     const Host::Context& context() { return request_->context(); }

@@ -12,7 +12,7 @@ namespace ManagerThreadsTests {
 using Testing::ProviderCall;
 
 constexpr int threadCount = 8;
-constexpr CMPIStatus Ok = {CMPI_RC_OK, nullptr};
+constexpr CMPIStatus ok = {CMPI_RC_OK, nullptr};
 
 void onThreads(const std::function<void()>& work)
 {
@@ -33,9 +33,9 @@ protected:
         providers_["SpecialParts"].handle(
             [this](const ProviderCall& call) { return answer(call); });
         providers_["Boxes"].handle([this](const ProviderCall& call) {
-            CMPIStatus status = Ok;
+            CMPIStatus status = ok;
             const CMPIObjectPath* const target =
-                CMNewObjectPath(broker(), Testing::NameSpace, "Part", nullptr);
+                CMNewObjectPath(broker(), Testing::testNameSpace, "Part", nullptr);
             const CMPIEnumeration* const found =
                 CBEnumInstances(broker(), call.context, target, nullptr, &status);
             while (found != nullptr && CMHasNext(found, nullptr))
@@ -55,9 +55,9 @@ TEST_F(ManagerThreadsTest, EveryRequestGetsItsWholeAnswer)
         for (int i = 0; i < 50; ++i) {
             Host::Request request(manager_.broker());
             const auto found = manager_.enumerateInstances(
-                request.context(), request.makePath(Testing::NameSpace, "Thing"), nullptr);
+                request.context(), request.makePath(Testing::testNameSpace, "Thing"), nullptr);
             const auto names = manager_.associatorNames(
-                request.context(), request.makePath(Testing::NameSpace, "Box"), {});
+                request.context(), request.makePath(Testing::testNameSpace, "Box"), {});
             if (found.instances().size() != 4 || names.paths().size() != 1)
                 ++wrong;
         }

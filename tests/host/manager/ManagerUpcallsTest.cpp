@@ -11,14 +11,14 @@ using Testing::ProviderCall;
 using Testing::refusalOf;
 using ::testing::StartsWith;
 
-constexpr CMPIStatus Ok = {CMPI_RC_OK, nullptr};
+constexpr CMPIStatus ok = {CMPI_RC_OK, nullptr};
 
 class ManagerUpcallsTest : public Testing::ManagerTest {
 protected:
     // Returns the path that a provider gets.
     CMPIObjectPath* target(const char* className) const
     {
-        return CMNewObjectPath(broker(), Testing::NameSpace, className, nullptr);
+        return CMNewObjectPath(broker(), Testing::testNameSpace, className, nullptr);
     }
 
     // Delivers all objects that an up-call returned.
@@ -34,14 +34,14 @@ protected:
             else
                 CMReturnInstance(call.result, data.value.inst);
         }
-        return Ok;
+        return ok;
     }
 };
 
 TEST_F(ManagerUpcallsTest, WhatAProviderFindsCanBeHandedOver)
 {
     script("Boxes", [this](const ProviderCall& call) {
-        CMPIStatus status = Ok;
+        CMPIStatus status = ok;
         const CMPIEnumeration* const found =
             CBEnumInstanceNames(broker(), call.context, target("Part"), &status);
         return handOver(call, found, status);
@@ -56,7 +56,7 @@ TEST_F(ManagerUpcallsTest, WhatAProviderFindsCanBeHandedOver)
 TEST_F(ManagerUpcallsTest, InstancesAreFoundToo)
 {
     script("Boxes", [this](const ProviderCall& call) {
-        CMPIStatus status = Ok;
+        CMPIStatus status = ok;
         const CMPIEnumeration* const found =
             CBEnumInstances(broker(), call.context, target("Part"), nullptr, &status);
         return handOver(call, found, status);
@@ -70,11 +70,11 @@ TEST_F(ManagerUpcallsTest, TheContextIsTheCallersAllTheWayDown)
     const CMPIContext* seen = nullptr;
     script("Boxes", [this](const ProviderCall& call) {
         CBEnumInstanceNames(broker(), call.context, target("SpecialPart"), nullptr);
-        return Ok;
+        return ok;
     });
     script("SpecialParts", [&](const ProviderCall& call) {
         seen = call.context;
-        return Ok;
+        return ok;
     });
     manager_.enumerateInstanceNames(context(), path("Box"));
     EXPECT_EQ(seen, context().handle());
@@ -85,7 +85,7 @@ TEST_F(ManagerUpcallsTest, AnErrorReachesTheCallerWithItsMessage)
     script("SpecialParts",
         [&](const ProviderCall&) { return failure(CMPI_RC_ERR_ACCESS_DENIED, "not for you"); });
     script("Boxes", [this](const ProviderCall& call) {
-        CMPIStatus status = Ok;
+        CMPIStatus status = ok;
         EXPECT_EQ(CBEnumInstances(broker(), call.context, target("SpecialPart"), nullptr, &status),
             nullptr);
         return status;
@@ -97,7 +97,7 @@ TEST_F(ManagerUpcallsTest, AnErrorReachesTheCallerWithItsMessage)
 TEST_F(ManagerUpcallsTest, UnknownAndUnservedClassesAreToldApart)
 {
     script("Boxes", [this](const ProviderCall& call) {
-        CMPIStatus status = Ok;
+        CMPIStatus status = ok;
         CBEnumInstances(broker(), call.context, target("Unheard"), nullptr, &status);
         EXPECT_EQ(status.rc, CMPI_RC_ERR_INVALID_CLASS);
         CBEnumInstances(broker(), call.context, target("Idle"), nullptr, &status);
@@ -110,13 +110,13 @@ TEST_F(ManagerUpcallsTest, UnknownAndUnservedClassesAreToldApart)
 TEST_F(ManagerUpcallsTest, ACircleEndsInAnError)
 {
     script("Boxes", [this](const ProviderCall& call) {
-        CMPIStatus status = Ok;
+        CMPIStatus status = ok;
         const CMPIEnumeration* const found =
             CBEnumInstances(broker(), call.context, target("SpecialPart"), nullptr, &status);
         return handOver(call, found, status);
     });
     script("SpecialParts", [this](const ProviderCall& call) {
-        CMPIStatus status = Ok;
+        CMPIStatus status = ok;
         const CMPIEnumeration* const found =
             CBEnumInstances(broker(), call.context, target("Box"), nullptr, &status);
         return handOver(call, found, status);
@@ -133,7 +133,7 @@ TEST_F(ManagerUpcallsTest, WithoutARequestOnTheThreadThereIsNoAnswer)
 {
     Host::Context& borrowed = request_->context();
     std::thread([&] {
-        CMPIStatus status = Ok;
+        CMPIStatus status = ok;
         EXPECT_EQ(
             CBEnumInstances(broker(), borrowed.handle(), path("Box").handle(), nullptr, &status),
             nullptr);

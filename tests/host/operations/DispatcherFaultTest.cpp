@@ -73,7 +73,7 @@ TEST_F(DispatcherFaultTest, AnAnswerThatLacksObjectsIsNone)
         manager_.deliver(asked, "Thing", "a");
         CMReturnInstance(asked.result, nullptr);
         CMReturnObjectPath(asked.result, nullptr);
-        return Ok;
+        return ok;
     });
     EXPECT_EQ(errorOf("EnumerateInstances", ofThing_),
         "1: the provider could not build 2 of the objects");
@@ -90,7 +90,7 @@ TEST_F(DispatcherFaultTest, NothingIsReadOfOperationsThatChangeSomethingOrQuery)
 {
     manager_.script("Things", [](const ProviderCall&) {
         ADD_FAILURE() << "was asked";
-        return Ok;
+        return ok;
     });
     for (const std::string operation : {"CreateInstance", "ModifyInstance", "DeleteInstance",
              "SetProperty", "CreateClass", "ModifyClass", "DeleteClass", "SetQualifier",

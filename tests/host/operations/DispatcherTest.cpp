@@ -89,7 +89,7 @@ TEST_F(DispatcherTest, AClassWithoutSubclassesLeavesNothingOut)
     manager_.script("Gauges", [this](const ProviderCall& asked) {
         EXPECT_EQ(asked.properties, nullptr);
         ++calls_;
-        return Ok;
+        return ok;
     });
     ask("EnumerateInstances", classOf("ClassName", "Gauge") + valueOf("DeepInheritance", "FALSE"));
     EXPECT_EQ(calls_, 1);
@@ -103,7 +103,7 @@ TEST_F(DispatcherTest, TheFiltersOfAssociationsArrive)
             EXPECT_STREQ(asked.resultRole, "Part");
         }
         ++calls_;
-        return Ok;
+        return ok;
     });
     const std::string source = thing();
     const std::string associators = classOf("AssocClass", "Link") + valueOf("Role", "Owner") +

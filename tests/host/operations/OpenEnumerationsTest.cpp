@@ -19,7 +19,7 @@ using Host::EnumerationOwner;
 using Host::FoundObjects;
 using namespace std::chrono_literals;
 
-const EnumerationOwner Owner = {"somebody", "root/test", false};
+const EnumerationOwner someOwner = {"somebody", "root/test", false};
 
 std::string refusalOf(const std::function<void()>& operation)
 {
@@ -45,11 +45,12 @@ protected:
 
     std::string open(std::size_t count, std::chrono::seconds timeout = 30s)
     {
-        return enumerations_.open({Owner, objects(count), {}, timeout});
+        return enumerations_.open({someOwner, objects(count), {}, timeout});
     }
 
     // Returns the pulled objects, followed by a full stop at the end of the enumeration.
-    std::string pull(const std::string& context, std::size_t count, EnumerationOwner owner = Owner)
+    std::string pull(
+        const std::string& context, std::size_t count, EnumerationOwner owner = someOwner)
     {
         std::string text;
         const auto pulled = enumerations_.pull(context, owner, count);
@@ -94,7 +95,7 @@ TEST_F(OpenEnumerationsTest, ContextsAre128BitsAndNeverTheSame)
         EXPECT_EQ(context.size(), 32U);
         EXPECT_EQ(context.find_first_not_of("0123456789abcdef"), std::string::npos);
         contexts.insert(context);
-        enumerations_.close(context, Owner);
+        enumerations_.close(context, someOwner);
     }
     EXPECT_EQ(contexts.size(), 1000U);
 }
@@ -146,9 +147,9 @@ TEST_F(OpenEnumerationsTest, MemoryStaysWithWhatWasPulled)
     FoundObjects made(std::move(memory));
     for (int i = 0; i < 4; ++i)
         made.add(ClassName{"x"});
-    const std::string context = enumerations_.open({Owner, std::move(made), {}, 10s});
-    auto pulled = enumerations_.pull(context, Owner, 1);
-    enumerations_.close(context, Owner);
+    const std::string context = enumerations_.open({someOwner, std::move(made), {}, 10s});
+    auto pulled = enumerations_.pull(context, someOwner, 1);
+    enumerations_.close(context, someOwner);
     EXPECT_FALSE(watched.expired());
     pulled = {};
     EXPECT_TRUE(watched.expired());
@@ -160,7 +161,7 @@ TEST_F(OpenEnumerationsTest, MemoryGoesWithTheTime)
     const std::weak_ptr<Host::Arena> watched = memory;
     FoundObjects made(std::move(memory));
     made.add(ClassName{"x"});
-    enumerations_.open({Owner, std::move(made), {}, 10s});
+    enumerations_.open({someOwner, std::move(made), {}, 10s});
     now_ += 9s;
     enumerations_.removeExpired();
     EXPECT_FALSE(watched.expired());
@@ -176,7 +177,7 @@ TEST(OpenEnumerationsThreadsTest, EachObjectIsPulledOnce)
     FoundObjects made;
     for (std::size_t i = 0; i < count; ++i)
         made.add(ClassName{"x"});
-    const std::string context = enumerations.open({Owner, std::move(made), {}, 60s});
+    const std::string context = enumerations.open({someOwner, std::move(made), {}, 60s});
     std::atomic<std::size_t> pulled = 0;
     std::atomic<int> ends = 0;
     std::vector<std::thread> threads;
@@ -184,11 +185,12 @@ TEST(OpenEnumerationsThreadsTest, EachObjectIsPulledOnce)
         threads.emplace_back([&] {
             try {
                 for (;;) {
-                    const auto next = enumerations.pull(context, Owner, 3);
+                    const auto next = enumerations.pull(context, someOwner, 3);
                     pulled += next.objects.size();
                     ends += next.isOver ? 1 : 0;
                     // Other enumerations are opened and closed.
-                    enumerations.close(enumerations.open({Owner, next.objects, {}, 60s}), Owner);
+                    enumerations.close(
+                        enumerations.open({someOwner, next.objects, {}, 60s}), someOwner);
                 }
             } catch (const Host::Refusal& refusal) {
                 EXPECT_EQ(static_cast<int>(refusal.code()), 21);

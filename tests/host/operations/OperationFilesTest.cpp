@@ -21,7 +21,7 @@ namespace OperationTests {
 
 namespace {
 
-const std::filesystem::path Folder = SENSOR_PROFILE_SOURCE_DIR "/tests/data/cimxml/operations";
+const std::filesystem::path folder = SENSOR_PROFILE_SOURCE_DIR "/tests/data/cimxml/operations";
 
 // Returns the text without line breaks and the indentation after them.
 std::string unfolded(const std::string& text)
@@ -61,7 +61,7 @@ protected:
     {
         const std::string before = between(request, "<!-- after ", " -->");
         if (!before.empty())
-            responseTo(exchangeIn(Folder / before).request);
+            responseTo(exchangeIn(folder / before).request);
         const std::string response = answerTo(*manager_, filledIn(request));
         if (const std::string context = contextIn(response); !context.empty())
             context_ = context;
@@ -74,20 +74,20 @@ protected:
 
 TEST_P(OperationFilesTest, ResponseIsTheExpectedOne)
 {
-    const Exchange exchange = exchangeIn(Folder / (GetParam() + ".xml"));
+    const Exchange exchange = exchangeIn(folder / (GetParam() + ".xml"));
     const std::string response = responseTo(exchange.request);
     EXPECT_EQ(unfolded(response), unfolded(filledIn(exchange.response)));
 }
 
-INSTANTIATE_TEST_SUITE_P(Files, OperationFilesTest, testing::ValuesIn(Testing::fileStemsIn(Folder)),
+INSTANTIATE_TEST_SUITE_P(Files, OperationFilesTest, testing::ValuesIn(Testing::fileStemsIn(folder)),
     [](const auto& file) { return Testing::replaced(file.param, "-", "_"); });
 
 TEST(OperationFilesCoverageTest, HasEveryOperationWithEachOfItsParameters)
 {
     using Host::CimXml::Parameter;
     std::map<std::string, std::string> textsByOperation;
-    for (const std::string& name : Testing::fileStemsIn(Folder)) {
-        const std::string text = exchangeIn(Folder / (name + ".xml")).request;
+    for (const std::string& name : Testing::fileStemsIn(folder)) {
+        const std::string text = exchangeIn(folder / (name + ".xml")).request;
         textsByOperation[between(text, "<IMETHODCALL NAME=\"", "\"")] += text;
     }
     for (const char* const operation :

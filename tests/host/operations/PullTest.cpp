@@ -12,7 +12,7 @@ namespace {
 using namespace std::chrono_literals;
 using testing::StartsWith;
 
-constexpr std::string_view InstanceElement = "<VALUE.INSTANCEWITHPATH>";
+constexpr std::string_view instanceElement = "<VALUE.INSTANCEWITHPATH>";
 
 class PullTest : public testing::Test {
 protected:
@@ -48,7 +48,7 @@ TEST_F(PullTest, WhatComesAtOnceStaysNotOpen)
     for (int i = 0; i < 10; ++i) {
         const std::string answer = open(3);
         EXPECT_EQ(errorIn(answer), "");
-        EXPECT_EQ(countOf(answer, InstanceElement), 2U);
+        EXPECT_EQ(countOf(answer, instanceElement), 2U);
         EXPECT_TRUE(isEndOfSequence(answer));
         EXPECT_EQ(contextIn(answer), "");
     }
@@ -63,10 +63,10 @@ TEST_F(PullTest, AnEmptyEnumerationEndsWhenItIsOpened)
 TEST_F(PullTest, AnAnswerHasNoMoreObjectsThanTheLimit)
 {
     const std::string first = open(100);
-    EXPECT_EQ(countOf(first, InstanceElement), 3U);
+    EXPECT_EQ(countOf(first, instanceElement), 3U);
     EXPECT_FALSE(isEndOfSequence(first));
     const std::string second = pull(contextIn(first), 4'000'000'000U);
-    EXPECT_EQ(countOf(second, InstanceElement), 2U);
+    EXPECT_EQ(countOf(second, instanceElement), 2U);
     EXPECT_TRUE(isEndOfSequence(second));
 }
 
@@ -126,7 +126,7 @@ TEST_F(PullTest, BadTimesAreRefusedBeforeAnythingIsEnumerated)
 {
     manager_.script("Things", [](const ProviderCall&) {
         ADD_FAILURE() << "was asked";
-        return Ok;
+        return ok;
     });
     for (const char* const time : {"0", "601", "4294967295"})
         EXPECT_THAT(errorIn(open(0, valueOf("OperationTimeout", time))),
@@ -166,7 +166,7 @@ TEST_F(PullTest, WhatWasPulledIsReadWhenTheRestIsGone)
     ask("CloseEnumeration", valueOf("EnumerationContext", context));
     EXPECT_THAT(errorIn(pull(context, 1)), StartsWith("21"));
     const std::string answer = textOf(*pulled);
-    EXPECT_EQ(countOf(answer, InstanceElement), 3U);
+    EXPECT_EQ(countOf(answer, instanceElement), 3U);
     EXPECT_EQ(contextIn(answer), context);
 }
 

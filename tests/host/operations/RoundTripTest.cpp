@@ -11,25 +11,25 @@ namespace OperationTests {
 
 namespace {
 
-constexpr std::string_view Begin = "<INSTANCENAME ";
-constexpr std::string_view End = "</INSTANCENAME>";
+constexpr std::string_view startOfName = "<INSTANCENAME ";
+constexpr std::string_view endOfName = "</INSTANCENAME>";
 
 // Returns the instance names in the text, without those nested in others.
 std::vector<std::string> namesIn(const std::string& text)
 {
     std::vector<std::string> names;
-    for (auto from = text.find(Begin); from != std::string::npos;) {
+    for (auto from = text.find(startOfName); from != std::string::npos;) {
         auto to = from;
         for (int depth = 0;;) {
-            const auto begin = text.find(Begin, to);
-            const auto end = text.find(End, to);
+            const auto begin = text.find(startOfName, to);
+            const auto end = text.find(endOfName, to);
             depth += begin < end ? 1 : -1;
-            to = begin < end ? begin + Begin.size() : end + End.size();
+            to = begin < end ? begin + startOfName.size() : end + endOfName.size();
             if (depth == 0)
                 break;
         }
         names.push_back(text.substr(from, to - from));
-        from = text.find(Begin, to);
+        from = text.find(startOfName, to);
     }
     return names;
 }

@@ -24,7 +24,7 @@ using CimXmlTests::call;
 using CimXmlTests::thing;
 using Testing::ProviderCall;
 
-inline constexpr CMPIStatus Ok = {CMPI_RC_OK, nullptr};
+inline constexpr CMPIStatus ok = {CMPI_RC_OK, nullptr};
 
 class ScriptedManager {
 public:
@@ -33,7 +33,7 @@ public:
               classes(), manager_, [this] { return hostName_; }, limits, [this] { return now_; })
     {
         for (const char* const name : {"Things", "Gauges", "Links"})
-            script(name, [](const ProviderCall&) { return Ok; });
+            script(name, [](const ProviderCall&) { return ok; });
     }
 
     OperationHandler& operator*() { return dispatcher_; }
@@ -49,7 +49,7 @@ public:
         script("Things", [this, count](const ProviderCall& asked) {
             for (unsigned number = 0; number < count; ++number)
                 deliver(asked, "Thing", std::to_string(number));
-            return Ok;
+            return ok;
         });
     }
 

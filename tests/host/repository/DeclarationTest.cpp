@@ -17,13 +17,13 @@ using Testing::compile;
 using Testing::compileBare;
 using Testing::constant;
 using Testing::defaultOf;
-using Testing::NameSpace;
 using Testing::propertyNamed;
+using Testing::testNameSpace;
 
 TEST(DeclarationTest, AnEmptyFileDeclaresNothing)
 {
     for (const char* const text : {"", " \t\r\n\f\v", "// the end"})
-        EXPECT_TRUE(compileBare(text)->findNamespace(NameSpace)->classes().empty()) << text;
+        EXPECT_TRUE(compileBare(text)->findNamespace(testNameSpace)->classes().empty()) << text;
 }
 
 TEST(DeclarationTest, KeywordsAndTypesMayBeWrittenInAnyCase)
@@ -50,7 +50,7 @@ TEST(DeclarationTest, QualifiersHaveTypeDefaultScopesAndFlavors)
         Qualifier Two : string[], Scope(property, method, reference),
             Flavor(DisableOverride, Restricted);
         Qualifier Three : string = null, Scope(any), Flavor(EnableOverride, ToSubclass);)");
-    const auto& one = *repository->findQualifier(NameSpace, "one");
+    const auto& one = *repository->findQualifier(testNameSpace, "one");
     EXPECT_EQ(one.name, "One");
     EXPECT_EQ(one.type, CMPI_boolean);
     EXPECT_EQ(one.defaultValue, constant(true));
@@ -58,7 +58,7 @@ TEST(DeclarationTest, QualifiersHaveTypeDefaultScopesAndFlavors)
     EXPECT_FALSE(one.scopes.has(Scope::property));
     EXPECT_EQ(one.flavor, (Host::Flavor{true, true, true}));
 
-    const auto& two = *repository->findQualifier(NameSpace, "Two");
+    const auto& two = *repository->findQualifier(testNameSpace, "Two");
     EXPECT_EQ(two.type, CMPI_stringA);
     EXPECT_TRUE(Host::isNull(two.defaultValue));
     EXPECT_TRUE(two.scopes.has(Scope::property));
@@ -67,7 +67,7 @@ TEST(DeclarationTest, QualifiersHaveTypeDefaultScopesAndFlavors)
     EXPECT_FALSE(two.scopes.has(Scope::parameter));
     EXPECT_EQ(two.flavor, (Host::Flavor{false, false, false}));
 
-    const auto& three = *repository->findQualifier(NameSpace, "THREE");
+    const auto& three = *repository->findQualifier(testNameSpace, "THREE");
     EXPECT_TRUE(Host::isNull(three.defaultValue));
     for (const Scope scope : {Scope::classes, Scope::association, Scope::indication,
              Scope::property, Scope::reference, Scope::method, Scope::parameter})

@@ -13,8 +13,8 @@ namespace InheritanceTests {
 using Testing::classNamed;
 using Testing::compile;
 using ::testing::ElementsAre;
-using Testing::NameSpace;
 using Testing::propertyNamed;
+using Testing::testNameSpace;
 
 template <typename List>
 std::vector<std::string> namesOf(const List& list)
@@ -53,12 +53,12 @@ TEST(InheritanceTest, KeysAreThoseOfTheClassThatDeclaresThem)
         class Root { string Name; string Other; };
         class A : Root { [Key] string Two; [Key] string One; [Key, Override("Name")] string Name; };
         class B : A { [Override("One")] string ONE; string Three; };)");
-    EXPECT_THAT(*repository->keysOf(NameSpace, "Root"), ElementsAre());
-    EXPECT_THAT(*repository->keysOf(NameSpace, "A"), ElementsAre("Two", "One", "Name"));
-    EXPECT_THAT(*repository->keysOf(NameSpace, "B"), ElementsAre("Two", "One", "Name"));
+    EXPECT_THAT(*repository->keysOf(testNameSpace, "Root"), ElementsAre());
+    EXPECT_THAT(*repository->keysOf(testNameSpace, "A"), ElementsAre("Two", "One", "Name"));
+    EXPECT_THAT(*repository->keysOf(testNameSpace, "B"), ElementsAre("Two", "One", "Name"));
     EXPECT_TRUE(propertyNamed(*repository, "B", "One").isKey);
     EXPECT_FALSE(propertyNamed(*repository, "Root", "Name").isKey);
-    EXPECT_EQ(repository->keysOf(NameSpace, "C"), nullptr);
+    EXPECT_EQ(repository->keysOf(testNameSpace, "C"), nullptr);
 }
 
 TEST(InheritanceTest, AnOverriddenPropertyKeepsItsDefaultUnlessItGetsAnother)
@@ -79,7 +79,7 @@ TEST(InheritanceTest, AReferenceMayBeNarrowedToASubclass)
         [Association] class L { [Key] A ref One; [Key] A ref Two; };
         [Association] class M : L { [Override("One")] B ref One; };
         [Association] class N : M { [Override("One")] b ref One; };)");
-    const auto references = repository->referencesOf(NameSpace, "m");
+    const auto references = repository->referencesOf(testNameSpace, "m");
     ASSERT_EQ(references.size(), 2U);
     EXPECT_EQ(references[0].name, "One");
     EXPECT_EQ(references[0].className, "B");

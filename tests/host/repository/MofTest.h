@@ -16,9 +16,9 @@
 
 namespace Testing {
 
-inline constexpr const char* NameSpace = "root/test";
+inline constexpr const char* testNameSpace = "root/test";
 
-inline constexpr std::string_view CommonQualifiers = R"(
+inline constexpr std::string_view commonQualifiers = R"(
 Qualifier Abstract : boolean = false, Scope(class, association, indication), Flavor(Restricted);
 Qualifier Association : boolean = false, Scope(association), Flavor(DisableOverride);
 Qualifier Key : boolean = false, Scope(property, reference), Flavor(DisableOverride, ToSubclass);
@@ -32,15 +32,15 @@ Qualifier Version : string = null, Scope(class, association, indication), Flavor
 inline std::unique_ptr<const Host::Repository> compileBare(std::string_view text)
 {
     Host::Compiler compiler;
-    compiler.compileText(text, "test.mof", NameSpace);
+    compiler.compileText(text, "test.mof", testNameSpace);
     return std::move(compiler).finish();
 }
 
 inline std::unique_ptr<const Host::Repository> compile(std::string_view text)
 {
     Host::Compiler compiler;
-    compiler.compileText(CommonQualifiers, "qualifiers.mof", NameSpace);
-    compiler.compileText(text, "test.mof", NameSpace);
+    compiler.compileText(commonQualifiers, "qualifiers.mof", testNameSpace);
+    compiler.compileText(text, "test.mof", testNameSpace);
     return std::move(compiler).finish();
 }
 
@@ -53,7 +53,7 @@ inline std::string errorOf(std::string_view text)
 inline const Host::ClassDeclaration& classNamed(
     const Host::Repository& repository, std::string_view name)
 {
-    const Host::ClassDeclaration* const found = repository.findClass(NameSpace, name);
+    const Host::ClassDeclaration* const found = repository.findClass(testNameSpace, name);
     if (found == nullptr)
         throw std::runtime_error("no class " + std::string(name));
     return *found;

@@ -9,14 +9,14 @@
 
 namespace PragmaTests {
 
-using Testing::NameSpace;
+using Testing::testNameSpace;
 
 class PragmaTest : public ::testing::Test {
 protected:
     std::unique_ptr<const Host::Repository> compileFile(const std::string& file)
     {
         Host::Compiler compiler;
-        compiler.compileFile(file, NameSpace);
+        compiler.compileFile(file, testNameSpace);
         return std::move(compiler).finish();
     }
 
@@ -35,7 +35,7 @@ TEST_F(PragmaTest, IncludesAreRelativeToTheirFile)
     folder_.write("sub/c.mof", "class C {};");
     const std::string file =
         folder_.write("a.mof", "#pragma include (\"sub/b.mof\")\nclass A : B {};");
-    EXPECT_TRUE(compileFile(file)->isDerivedFrom(NameSpace, "A", "C"));
+    EXPECT_TRUE(compileFile(file)->isDerivedFrom(testNameSpace, "A", "C"));
 }
 
 TEST_F(PragmaTest, ErrorsNameTheIncludedFile)
@@ -66,7 +66,7 @@ TEST_F(PragmaTest, AFileIsIncludedAsOftenAsNamespacesNeedIt)
         #pragma include ("b.mof")
         #pragma namespace ("root/two")
         #pragma include ("b.mof"))"));
-    EXPECT_NE(repository->findClass(NameSpace, "B"), nullptr);
+    EXPECT_NE(repository->findClass(testNameSpace, "B"), nullptr);
     EXPECT_NE(repository->findClass("root/two", "B"), nullptr);
 }
 
@@ -81,7 +81,7 @@ TEST_F(PragmaTest, ANamespaceHoldsForTheRestOfTheFileAndWhatItIncludes)
         class D {};)"));
     ASSERT_EQ(repository->namespaces().size(), 3U);
     EXPECT_EQ(repository->namespaces()[1]->name(), "root/two");
-    EXPECT_NE(repository->findClass(NameSpace, "A"), nullptr);
+    EXPECT_NE(repository->findClass(testNameSpace, "A"), nullptr);
     EXPECT_NE(repository->findClass("root/two", "A"), nullptr);
     EXPECT_NE(repository->findClass("root/two", "B"), nullptr);
     EXPECT_NE(repository->findClass("root/two", "D"), nullptr);

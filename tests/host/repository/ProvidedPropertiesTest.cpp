@@ -20,11 +20,11 @@ namespace ProvidedPropertiesTests {
 
 using ::testing::UnorderedElementsAreArray;
 
-constexpr const char* Cimv2 = "root/cimv2";
+constexpr const char* cimv2 = "root/cimv2";
 
 struct ProvidedClass {
     const char* name;
-    const char* nameSpace = Cimv2;
+    const char* nameSpace = cimv2;
 };
 
 void PrintTo(const ProvidedClass& provided, std::ostream* out)

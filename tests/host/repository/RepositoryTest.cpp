@@ -13,7 +13,7 @@ namespace RepositoryTests {
 
 using ::testing::ElementsAre;
 using ::testing::IsEmpty;
-using Testing::NameSpace;
+using Testing::testNameSpace;
 using Depth = Host::Repository::Depth;
 
 class RepositoryTest : public ::testing::Test {
@@ -40,42 +40,42 @@ TEST_F(RepositoryTest, FindsClassesInAnyCaseAndSpellsThemAsDeclared)
 {
     EXPECT_EQ(repository_->findClass("ROOT/TEST", "LEFTone")->name, "LeftOne");
     EXPECT_EQ(repository_->findClass("/root/test/", "LeftOne")->name, "LeftOne");
-    EXPECT_EQ(repository_->findClass(NameSpace, "Left One"), nullptr);
-    EXPECT_EQ(repository_->findClass(NameSpace, ""), nullptr);
+    EXPECT_EQ(repository_->findClass(testNameSpace, "Left One"), nullptr);
+    EXPECT_EQ(repository_->findClass(testNameSpace, ""), nullptr);
     EXPECT_EQ(repository_->findClass("root/other", "Left"), nullptr);
-    EXPECT_EQ(repository_->findQualifier(NameSpace, "KEY")->name, "Key");
-    EXPECT_EQ(repository_->findQualifier(NameSpace, "Lock"), nullptr);
+    EXPECT_EQ(repository_->findQualifier(testNameSpace, "KEY")->name, "Key");
+    EXPECT_EQ(repository_->findQualifier(testNameSpace, "Lock"), nullptr);
     EXPECT_EQ(repository_->findQualifier("", "Key"), nullptr);
-    EXPECT_EQ(repository_->findNamespace(NameSpace)->qualifiers().front()->name, "Abstract");
+    EXPECT_EQ(repository_->findNamespace(testNameSpace)->qualifiers().front()->name, "Abstract");
 }
 
 TEST_F(RepositoryTest, ListsSubclassesDirectAndDeep)
 {
-    EXPECT_THAT(names(repository_->subclasses(NameSpace, "top", Depth::direct)),
+    EXPECT_THAT(names(repository_->subclasses(testNameSpace, "top", Depth::direct)),
         ElementsAre("Left", "Right"));
-    EXPECT_THAT(names(repository_->subclasses(NameSpace, "Top", Depth::deep)),
+    EXPECT_THAT(names(repository_->subclasses(testNameSpace, "Top", Depth::deep)),
         ElementsAre("Left", "LeftOne", "LeftTwo", "Right"));
-    EXPECT_THAT(repository_->subclasses(NameSpace, "LeftOne", Depth::deep), IsEmpty());
-    EXPECT_THAT(repository_->subclasses(NameSpace, "None", Depth::deep), IsEmpty());
+    EXPECT_THAT(repository_->subclasses(testNameSpace, "LeftOne", Depth::deep), IsEmpty());
+    EXPECT_THAT(repository_->subclasses(testNameSpace, "None", Depth::deep), IsEmpty());
     EXPECT_THAT(repository_->subclasses("root", "Top", Depth::deep), IsEmpty());
 }
 
 TEST_F(RepositoryTest, ListsTheRootsForNoClass)
 {
-    EXPECT_THAT(names(repository_->subclasses(NameSpace, "", Depth::direct)),
+    EXPECT_THAT(names(repository_->subclasses(testNameSpace, "", Depth::direct)),
         ElementsAre("Top", "Other", "Link"));
-    EXPECT_THAT(names(repository_->subclasses(NameSpace, "", Depth::deep)),
+    EXPECT_THAT(names(repository_->subclasses(testNameSpace, "", Depth::deep)),
         ElementsAre("Top", "Left", "LeftOne", "LeftTwo", "Right", "Other", "Link"));
     EXPECT_THAT(repository_->subclasses("root", "", Depth::deep), IsEmpty());
 }
 
 TEST_F(RepositoryTest, TellsDescentAtAnyDistance)
 {
-    EXPECT_TRUE(repository_->isDerivedFrom(NameSpace, "LeftOne", "TOP"));
-    EXPECT_TRUE(repository_->isDerivedFrom(NameSpace, "LeftOne", "Left"));
-    EXPECT_FALSE(repository_->isDerivedFrom(NameSpace, "LeftOne", "Right"));
-    EXPECT_FALSE(repository_->isDerivedFrom(NameSpace, "Top", "Top"));
-    EXPECT_FALSE(repository_->isDerivedFrom(NameSpace, "None", "Top"));
+    EXPECT_TRUE(repository_->isDerivedFrom(testNameSpace, "LeftOne", "TOP"));
+    EXPECT_TRUE(repository_->isDerivedFrom(testNameSpace, "LeftOne", "Left"));
+    EXPECT_FALSE(repository_->isDerivedFrom(testNameSpace, "LeftOne", "Right"));
+    EXPECT_FALSE(repository_->isDerivedFrom(testNameSpace, "Top", "Top"));
+    EXPECT_FALSE(repository_->isDerivedFrom(testNameSpace, "None", "Top"));
     EXPECT_FALSE(repository_->isDerivedFrom("root", "Left", "Top"));
 }
 
@@ -89,18 +89,18 @@ TEST_F(RepositoryTest, ClassesTellDescentFromOneAnother)
 
 TEST_F(RepositoryTest, ListsReferencesOfAssociationsOnly)
 {
-    const auto references = repository_->referencesOf(NameSpace, "LINK");
+    const auto references = repository_->referencesOf(testNameSpace, "LINK");
     ASSERT_EQ(references.size(), 2U);
     EXPECT_EQ(references[0].name, "One");
     EXPECT_EQ(references[0].className, "Top");
     EXPECT_EQ(references[1].className, "Other");
-    EXPECT_THAT(repository_->referencesOf(NameSpace, "Top"), IsEmpty());
-    EXPECT_THAT(repository_->referencesOf(NameSpace, "None"), IsEmpty());
+    EXPECT_THAT(repository_->referencesOf(testNameSpace, "Top"), IsEmpty());
+    EXPECT_THAT(repository_->referencesOf(testNameSpace, "None"), IsEmpty());
 }
 
 TEST_F(RepositoryTest, KeysAreTheSameListAtEveryRequest)
 {
-    const auto* const keys = repository_->keysOf(NameSpace, "Right");
+    const auto* const keys = repository_->keysOf(testNameSpace, "Right");
     ASSERT_NE(keys, nullptr);
     EXPECT_THAT(*keys, ElementsAre("Id"));
     EXPECT_EQ(repository_->keysOf("Root/Test", "right"), keys);
@@ -114,9 +114,9 @@ TEST_F(RepositoryTest, AnswersManyThreadsAtOnce)
     for (int i = 0; i < 4; ++i)
         threads.emplace_back([&] {
             for (int round = 0; round < 500; ++round)
-                right += repository_->isDerivedFrom(NameSpace, "LeftTwo", "Top") &&
-                         repository_->keysOf(NameSpace, "LeftTwo")->size() == 1 &&
-                         repository_->subclasses(NameSpace, "Top", Depth::deep).size() == 4;
+                right += repository_->isDerivedFrom(testNameSpace, "LeftTwo", "Top") &&
+                         repository_->keysOf(testNameSpace, "LeftTwo")->size() == 1 &&
+                         repository_->subclasses(testNameSpace, "Top", Depth::deep).size() == 4;
         });
     for (std::thread& thread : threads)
         thread.join();

@@ -15,20 +15,20 @@ namespace ShippedSchemaTests {
 
 using ::testing::ElementsAre;
 
-constexpr const char* Cimv2 = "root/cimv2";
-constexpr const char* Interop = "root/interop";
-const std::filesystem::path Folder = SENSOR_PROFILE_SOURCE_DIR "/schema";
+constexpr const char* cimv2 = "root/cimv2";
+constexpr const char* interop = "root/interop";
+const std::filesystem::path folder = SENSOR_PROFILE_SOURCE_DIR "/schema";
 
 class ShippedSchemaTest : public ::testing::Test {
 protected:
     static std::unique_ptr<const Host::Repository> compileAll()
     {
         Host::Compiler compiler;
-        compiler.compileFile(Folder / "host.mof", "root/other");
+        compiler.compileFile(folder / "host.mof", "root/other");
         return std::move(compiler).finish();
     }
 
-    std::vector<std::string> ancestors(const char* className, const char* nameSpace = Cimv2) const
+    std::vector<std::string> ancestors(const char* className, const char* nameSpace = cimv2) const
     {
         std::vector<std::string> names;
         const auto* declared = repository_->findClass(nameSpace, className);
@@ -40,12 +40,12 @@ protected:
     std::vector<std::string> references(const char* className) const
     {
         std::vector<std::string> found;
-        for (const auto& each : repository_->referencesOf(Cimv2, className))
+        for (const auto& each : repository_->referencesOf(cimv2, className))
             found.push_back(each.name + " -> " + each.className);
         return found;
     }
 
-    const std::vector<std::string>& keys(const char* className, const char* nameSpace = Cimv2) const
+    const std::vector<std::string>& keys(const char* className, const char* nameSpace = cimv2) const
     {
         return *repository_->keysOf(nameSpace, className);
     }
@@ -94,27 +94,27 @@ TEST_F(ShippedSchemaTest, AssociationsAreKeyedByTheirReferences)
     EXPECT_THAT(references("ZUMLO_SensorSystemDevice"),
         ElementsAre(
             "GroupComponent -> ZUMLO_ComputerSystem", "PartComponent -> ZUMLO_NumericSensor"));
-    EXPECT_TRUE(repository_->findClass(Cimv2, "ZUMLO_SensorSystemDevice")->isAssociation);
-    EXPECT_FALSE(repository_->findClass(Cimv2, "ZUMLO_NumericSensor")->isAssociation);
+    EXPECT_TRUE(repository_->findClass(cimv2, "ZUMLO_SensorSystemDevice")->isAssociation);
+    EXPECT_FALSE(repository_->findClass(cimv2, "ZUMLO_NumericSensor")->isAssociation);
 }
 
 TEST_F(ShippedSchemaTest, InteropDescribesTheObjectManager)
 {
-    EXPECT_THAT(keys("CIM_Namespace", Interop),
+    EXPECT_THAT(keys("CIM_Namespace", interop),
         ElementsAre("SystemCreationClassName", "SystemName", "ObjectManagerCreationClassName",
             "ObjectManagerName", "CreationClassName", "Name"));
-    EXPECT_THAT(keys("CIM_ObjectManager", Interop),
+    EXPECT_THAT(keys("CIM_ObjectManager", interop),
         ElementsAre("SystemCreationClassName", "SystemName", "CreationClassName", "Name"));
-    EXPECT_THAT(ancestors("CIM_ObjectManager", Interop),
+    EXPECT_THAT(ancestors("CIM_ObjectManager", interop),
         ElementsAre("CIM_WBEMService", "CIM_Service", "CIM_EnabledLogicalElement",
             "CIM_LogicalElement", "CIM_ManagedSystemElement", "CIM_ManagedElement"));
 }
 
 TEST_F(ShippedSchemaTest, TheProfilesAssociationIsInBothNamespacesAndItsRegistrationInOne)
 {
-    EXPECT_THAT(keys("ZUMLO_SensorRegisteredProfile", Interop), ElementsAre("InstanceID"));
-    EXPECT_EQ(repository_->findClass(Cimv2, "ZUMLO_SensorRegisteredProfile"), nullptr);
-    for (const char* const nameSpace : {Cimv2, Interop})
+    EXPECT_THAT(keys("ZUMLO_SensorRegisteredProfile", interop), ElementsAre("InstanceID"));
+    EXPECT_EQ(repository_->findClass(cimv2, "ZUMLO_SensorRegisteredProfile"), nullptr);
+    for (const char* const nameSpace : {cimv2, interop})
         EXPECT_THAT(keys("ZUMLO_SensorElementConformsToProfile", nameSpace),
             ElementsAre("ConformantStandard", "ManagedElement"));
     EXPECT_THAT(references("ZUMLO_SensorElementConformsToProfile"),
@@ -126,13 +126,13 @@ TEST_F(ShippedSchemaTest, TheProfilesAssociationIsInBothNamespacesAndItsRegistra
 TEST_F(ShippedSchemaTest, TheFilesCompileOneByOneToo)
 {
     Host::Compiler compiler;
-    compiler.compileFile(Folder / "qualifiers.mof", Cimv2);
-    compiler.compileFile(Folder / "cim-ancestors.mof", Cimv2);
-    compiler.compileFile(Folder / "sensor-profile-computer-system.mof", Cimv2);
-    compiler.compileFile(Folder / "sensor-profile.mof", Cimv2);
-    compiler.compileFile(Folder / "sensor-profile-conformance.mof", Cimv2);
+    compiler.compileFile(folder / "qualifiers.mof", cimv2);
+    compiler.compileFile(folder / "cim-ancestors.mof", cimv2);
+    compiler.compileFile(folder / "sensor-profile-computer-system.mof", cimv2);
+    compiler.compileFile(folder / "sensor-profile.mof", cimv2);
+    compiler.compileFile(folder / "sensor-profile-conformance.mof", cimv2);
     const auto repository = std::move(compiler).finish();
-    EXPECT_NE(repository->findClass(Cimv2, "ZUMLO_SensorSystemDevice"), nullptr);
+    EXPECT_NE(repository->findClass(cimv2, "ZUMLO_SensorSystemDevice"), nullptr);
 }
 
 // docs/operations.md has administrators concatenate the classes that an object manager may lack.
@@ -140,17 +140,17 @@ TEST_F(ShippedSchemaTest, TheAncestorsCompileAsOneFile)
 {
     std::string all;
     for (const char* const name : {"qualifiers.mof", "cim-core.mof", "cim-ancestors.mof"})
-        for (const std::string& line : Testing::linesOf(Testing::contentOf(Folder / name)))
+        for (const std::string& line : Testing::linesOf(Testing::contentOf(folder / name)))
             if (!line.starts_with("#pragma include"))
                 all += line + '\n';
     const Testing::TemporaryFolder files;
     Host::Compiler compiler;
-    compiler.compileFile(files.write("10-cim.mof", all), Cimv2);
-    compiler.compileFile(Folder / "sensor-profile-computer-system.mof", Cimv2);
-    compiler.compileFile(Folder / "sensor-profile.mof", Cimv2);
-    compiler.compileFile(Folder / "sensor-profile-conformance.mof", Cimv2);
+    compiler.compileFile(files.write("10-cim.mof", all), cimv2);
+    compiler.compileFile(folder / "sensor-profile-computer-system.mof", cimv2);
+    compiler.compileFile(folder / "sensor-profile.mof", cimv2);
+    compiler.compileFile(folder / "sensor-profile-conformance.mof", cimv2);
     const auto repository = std::move(compiler).finish();
-    EXPECT_NE(repository->findClass(Cimv2, "ZUMLO_SensorSystemDevice"), nullptr);
+    EXPECT_NE(repository->findClass(cimv2, "ZUMLO_SensorSystemDevice"), nullptr);
 }
 
 TEST_F(ShippedSchemaTest, EveryElementIsDescribed)
