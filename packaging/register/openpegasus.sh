@@ -9,23 +9,41 @@ provider_folders() { printf '%s\n' /usr/lib64/Pegasus/providers /usr/lib/Pegasus
 interop_namespace=root/PG_InterOp
 modules=(SensorProfileModule SensorProfileRegistrationModule SensorProfileComputerSystemModule)
 
+# A provider of each module, which is registered in the namespace of the classes.
+declare -A provider_of=(
+  [SensorProfileModule]=SensorProfileProvider
+  [SensorProfileRegistrationModule]=SensorElementConformsToProfileProvider
+  [SensorProfileComputerSystemModule]=ComputerSystemProvider
+)
+
+# Prints the namespace of the classes of a registered module, or nothing where there is no cimcli or
+# an earlier failure left only a part of the registration.
+namespace_of() {
+  local key="ProviderModuleName=\"$1\",ProviderName=\"${provider_of[$1]}\",CapabilityID=\"1\""
+  # A second namespace, if there is one, is that of registered profiles.
+  cimcli gp "PG_ProviderCapabilities.$key" Namespaces -n $interop_namespace 2>/dev/null |
+    sed -n 's/^Namespaces = *\([^ ]*\).*/\1/p' || true
+}
+
 # Sets `registered` to those of our modules that OpenPegasus lists.
 find_registered_modules() {
-  local list each options=(--namespace NAMESPACE)
+  local list each registered_in='' options=()
   list=$(cimprovider -l) ||
     refuse "cimprovider -l failed with exit code $?: OpenPegasus must be running"
   registered=()
   for each in "${modules[@]}"; do
     if grep --quiet --line-regexp --fixed-strings -- "$each" <<<"$list"; then
       registered+=("$each")
+      registered_in=${registered_in:-$(namespace_of "$each")}
     fi
   done
-  [ ${#registered[@]} -gt 0 ] || return 0
+  [ -n "$registered_in" ] || return 0
   [[ " ${registered[*]} " == *" ${modules[-1]} "* ]] || options+=(--without-computer-system)
-  earlier_command="$(command_to register "${options[@]}") (NAMESPACE being the one it was in)"
+  earlier_command=$(command_to register --namespace "$registered_in" "${options[@]}")
 }
 
-removal_command() { command_to remove; }
+# Prints nothing where a registration was found, which it would remove.
+removal_command() { [ ${#registered[@]} -gt 0 ] || command_to remove; }
 
 remove_modules() {
   local each
@@ -57,7 +75,7 @@ openpegasus_register() {
 }
 
 openpegasus_remove() {
-  # OpenPegasus lists modules without their namespaces.
+  # cimprovider removes a module from all its namespaces.
   [ -z "$namespace" ] ||
     refuse_usage "--namespace: remove takes everything from OpenPegasus," \
       "in whichever namespace it is"
