@@ -59,6 +59,14 @@ TEST_F(WithoutObjectManagerTest, RefusesCommandLinesThatMakeNoSense)
         expectRefusal({"register", "--namespace", name}, 2, "is no namespace");
 }
 
+TEST_F(WithoutObjectManagerTest, RefusesTheNamespacesOfRegisteredProfiles)
+{
+    for (const std::string name : {"root/interop", "ROOT/Interop", "interop", "Interop",
+             "root/PG_InterOp", "root/pg_interop"})
+        expectRefusal({"register", "--namespace", name}, 2,
+            name + " is the namespace of registered profiles");
+}
+
 TEST_F(WithoutObjectManagerTest, ExplainsItself)
 {
     const std::string help = mustRun({"--help"});
