@@ -16,6 +16,10 @@ foreach(component IN ITEMS provider tool)
   string(TOUPPER ${component} name)
   set(CPACK_DEBIAN_${name}_PACKAGE_NAME ${${component}_package})
   set(CPACK_DEBIAN_${name}_PACKAGE_SECTION admin)
+  if(libsensors_source)
+    # cpack has no variable for this field, which therefore follows another one.
+    string(APPEND CPACK_DEBIAN_${name}_PACKAGE_SECTION "\nBuilt-Using: ${libsensors_source}")
+  endif()
   set(CPACK_DEBIAN_${name}_DESCRIPTION "${${component}_summary}\n${${component}_description}")
   file(GLOB CPACK_DEBIAN_${name}_PACKAGE_CONTROL_EXTRA
     "${CMAKE_CURRENT_LIST_DIR}/debian/${component}/*")

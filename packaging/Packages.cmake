@@ -34,6 +34,17 @@ set(tool_description
 clients see them, and serves them to such clients over HTTP where no other
 object manager runs.")
 
+# The source of the copy of libsensors that both packages contain, such as
+# `lm-sensors (= 1:3.6.0-7.1)`; empty where it is not from a Debian package.
+set(libsensors_source)
+find_program(DPKG_QUERY dpkg-query)
+if(LIBSENSORS_ARCHIVE AND DPKG_QUERY)
+  execute_process(
+    COMMAND "${DPKG_QUERY}" --show "--showformat=\${source:Package} (= \${source:Version})"
+      libsensors-dev
+    OUTPUT_VARIABLE libsensors_source ERROR_QUIET)
+endif()
+
 include(Debian.cmake)
 include(Rpm.cmake)
 

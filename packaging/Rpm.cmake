@@ -21,6 +21,7 @@ set(CPACK_RPM_PROVIDER_PACKAGE_AUTOPROV no)
 # The registration of sfcb uses find, which is not in every installation.
 set(CPACK_RPM_PROVIDER_PACKAGE_REQUIRES /usr/bin/find)
 set(CPACK_RPM_TOOL_PACKAGE_REQUIRES "sensor-profile-provider%{?_isa} = %{version}-%{release}")
+set(CPACK_RPM_TOOL_PACKAGE_SUGGESTS "lm_sensors, sblim-wbemcli")
 foreach(step IN ITEMS POST PREUN POSTUN)
   set(CPACK_RPM_TOOL_PACKAGE_REQUIRES_${step} systemd)
 endforeach()
@@ -38,6 +39,10 @@ foreach(component IN ITEMS provider tool)
   string(REGEX REPLACE "^hardware" "Hardware" CPACK_RPM_${name}_PACKAGE_SUMMARY
     "${${component}_summary}")
   set(CPACK_RPM_${name}_PACKAGE_DESCRIPTION "${${component}_description}")
+  if(LIBSENSORS_ARCHIVE)
+    string(REGEX REPLACE ".*= ([0-9]+:)?([^-]*).*" " = \\2" version "${libsensors_source}")
+    set(CPACK_RPM_${name}_PACKAGE_PROVIDES "bundled(lm_sensors)${version}")
+  endif()
   set(licence "${CMAKE_INSTALL_DATADIR}/licenses/${${component}_package}")
   install(FILES "${PROJECT_SOURCE_DIR}/LICENSE" DESTINATION "${licence}"
     COMPONENT ${component}-rpm EXCLUDE_FROM_ALL)

@@ -64,6 +64,15 @@ TEST_F(PackagesTest, DependOnWhatTheyLoad)
             "sensor-profile-provider (= " + field("sensor-profile-provider", "Version") + ")"));
 }
 
+// The library and sensorctl contain a copy of libsensors, whose licence requires its source.
+TEST_F(PackagesTest, NameTheSourceOfLibsensors)
+{
+    const std::string installed =
+        outputOf("dpkg-query --show --showformat='${source:Version}' libsensors-dev");
+    for (const char* const package : {"sensor-profile", "sensor-profile-provider"})
+        EXPECT_EQ(field(package, "Built-Using"), "lm-sensors (= " + installed + ")");
+}
+
 TEST_F(PackagesTest, CanBeReadByEverybody)
 {
     for (const char* const package : {"sensor-profile", "sensor-profile-provider"}) {

@@ -144,6 +144,22 @@ TEST(RpmTest, ProvidesNoLibraries)
         EXPECT_THAT(query(package, "--provides"), Not(Contains(HasSubstr(".so"))));
 }
 
+// The library and sensorctl contain a copy of libsensors.
+TEST(RpmTest, NamesTheVersionOfLibsensors)
+{
+    const std::string version =
+        outputOf("dpkg-query --show --showformat='${source:Upstream-Version}' "
+                 "libsensors-dev");
+    EXPECT_NE(version, "");
+    for (const std::string& package : {provider, tool})
+        EXPECT_THAT(query(package, "--provides"), Contains("bundled(lm_sensors) = " + version));
+}
+
+TEST(RpmTest, SuggestsWhatTheDebianPackagesSuggest)
+{
+    EXPECT_THAT(query(tool, "--suggests"), ElementsAre("lm_sensors", "sblim-wbemcli"));
+}
+
 TEST(RpmTest, HasTheVersionOfItsLogOfChanges)
 {
     for (const std::string& package : {provider, tool})
