@@ -10,10 +10,8 @@
 #include "companion/RegisteredProfile.h"
 #include "platform/utilities/ProviderUtilities.h"
 
-#include <algorithm>
 #include <array>
 #include <atomic>
-#include <span>
 
 namespace Vorn::Companion {
 
@@ -24,15 +22,6 @@ constexpr const char* ConformsClass = "ZUMLO_SensorElementConformsToProfile";
 // The names of the references.
 constexpr const char* standardRole = "ConformantStandard";
 constexpr const char* elementRole = "ManagedElement";
-
-// The names that a filter may give a class: its own and those of its superclasses.
-constexpr std::array<std::string_view, 2> associationClasses = {
-    ConformsClass, "CIM_ElementConformsToProfile"};
-constexpr std::array<std::string_view, 4> profileClasses = {RegisteredProfileClass,
-    "CIM_RegisteredProfile", "CIM_RegisteredSpecification", "CIM_ManagedElement"};
-constexpr std::array<std::string_view, 8> sensorClasses = {SensorClass, "CIM_NumericSensor",
-    "CIM_Sensor", "CIM_LogicalDevice", "CIM_EnabledLogicalElement", "CIM_LogicalElement",
-    "CIM_ManagedSystemElement", "CIM_ManagedElement"};
 
 // Some object managers call the factories again while requests run.
 std::atomic<const CMPIBroker*> theBroker = nullptr;
@@ -48,16 +37,14 @@ struct Filters {
     const char* resultRole = nullptr;
 };
 
-bool admits(const char* filter, std::span<const std::string_view> names)
+bool isUnset(const char* filter)
 {
-    return filter == nullptr || *filter == '\0' ||
-           std::any_of(names.begin(), names.end(),
-               [&](std::string_view name) { return isSameName(name, filter); });
+    return filter == nullptr || *filter == '\0';
 }
 
-bool admits(const char* filter, std::string_view name)
+bool admits(const char* filter, const char* name)
 {
-    return admits(filter, std::span(&name, 1));
+    return isUnset(filter) || isSameName(name, filter);
 }
 
 // One request to the provider.
@@ -90,30 +77,49 @@ public:
 
     CMPIStatus references(const Filters& filters)
     {
-        if (admits(filters.associationClass, associationClasses) &&
-            admits(filters.role, isFromProfile_ ? standardRole : elementRole))
+        if (isNear(filters))
             addAssociations(conformanceOf(upcalls_, target_));
         return answer_.finish();
     }
 
     CMPIStatus associators(const Filters& filters)
     {
-        using Classes = std::span<const std::string_view>;
-        if (admits(filters.associationClass, associationClasses) &&
-            admits(filters.resultClass,
-                isFromProfile_ ? Classes(sensorClasses) : Classes(profileClasses)) &&
-            admits(filters.role, isFromProfile_ ? standardRole : elementRole) &&
-            admits(filters.resultRole, isFromProfile_ ? elementRole : standardRole))
-            addFarEnds(conformanceOf(upcalls_, target_));
+        if (!isNear(filters) ||
+            !admits(filters.resultRole, isFromProfile_ ? elementRole : standardRole))
+            return answer_.finish();
+        const Conformance found = conformanceOf(upcalls_, target_);
+        if (!found.sensors.empty() &&
+            isOfAdmittedClass(
+                isFromProfile_ ? found.sensors.front() : found.profile, filters.resultClass))
+            addFarEnds(found);
         return answer_.finish();
     }
 
 private:
+    // Returns whether the filters admit the association from the target.
+    bool isNear(const Filters& filters) const
+    {
+        return admits(filters.role, isFromProfile_ ? standardRole : elementRole) &&
+               isOfAdmittedClass(newAssociationPath(), filters.associationClass);
+    }
+
+    // Returns whether the class of the path is that of the filter, or below it. The object manager
+    // has the superclasses.
+    bool isOfAdmittedClass(const CMPIObjectPath* path, const char* filter) const
+    {
+        return isUnset(filter) ||
+               (isUsable(path) && CMClassPathIsA(broker_, path, filter, nullptr) != 0);
+    }
+
+    const CMPIObjectPath* newAssociationPath() const
+    {
+        return newPath(broker_, nameSpaceOf(target_), ConformsClass, getSystemName());
+    }
+
     const CMPIObjectPath* associationPath(
         const CMPIObjectPath* profile, const CMPIObjectPath* sensor) const
     {
-        const CMPIObjectPath* const path =
-            newPath(broker_, nameSpaceOf(target_), ConformsClass, getSystemName());
+        const CMPIObjectPath* const path = newAssociationPath();
         const bool isWhole =
             addKey(path, standardRole, profile) && addKey(path, elementRole, sensor);
         return isWhole ? path : nullptr;
@@ -122,8 +128,7 @@ private:
     const CMPIInstance* association(
         const CMPIObjectPath* profile, const CMPIObjectPath* sensor) const
     {
-        const CMPIObjectPath* const path =
-            newPath(broker_, nameSpaceOf(target_), ConformsClass, getSystemName());
+        const CMPIObjectPath* const path = newAssociationPath();
         const CMPIInstance* const instance =
             path == nullptr ? nullptr : CMNewInstance(broker_, path, nullptr);
         if (!isUsable(instance))
@@ -146,8 +151,6 @@ private:
 
     void addFarEnds(const Conformance& found)
     {
-        if (found.sensors.empty())
-            return;
         if (!isFromProfile_ && kind_ == ResultKind::paths)
             answer_.add(found.profile);
         else if (!isFromProfile_)

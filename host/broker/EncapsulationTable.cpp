@@ -2,8 +2,10 @@
 
 #include "host/broker/Array.h"
 #include "host/broker/Broker.h"
+#include "host/broker/ClassInformation.h"
 #include "host/broker/Instance.h"
 #include "host/broker/Messages.h"
+#include "host/broker/Names.h"
 #include "host/broker/ObjectPath.h"
 #include "host/broker/Slot.h"
 #include "host/broker/String.h"
@@ -36,6 +38,16 @@ Array& newArray(const Broker&, CMPICount size, CMPIType type)
     return Array::make(Arena::required(), type, size);
 }
 
+bool classPathIsA(const Broker& broker, const CMPIObjectPath* path, const char* className)
+{
+    const auto& object = required<ObjectPath>(path);
+    const std::string_view wanted = requiredText(className, "the class name");
+    const ClassInformation* const classes = broker.classInformation();
+    return equalNames(object.className(), wanted) ||
+           (classes != nullptr &&
+               classes->isDerivedFrom(object.nameSpace(), object.className(), wanted));
+}
+
 } // namespace
 
 const CMPIBrokerEncFT encapsulationFunctions = {
@@ -49,7 +61,7 @@ const CMPIBrokerEncFT encapsulationFunctions = {
     .newDateTimeFromBinary = notOffered,
     .newDateTimeFromChars = notOffered,
     .newSelectExp = notOffered,
-    .classPathIsA = notOffered,
+    .classPathIsA = slot<&classPathIsA>,
     .toString = notOffered,
     .isOfType = notOffered,
     .getType = notOffered,

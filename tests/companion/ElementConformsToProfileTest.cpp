@@ -4,6 +4,7 @@
 
 #include "tests/companion/Factory.h"
 #include "tests/companion/ScriptedObjects.h"
+#include "tests/support/ClassTable.h"
 #include "tests/support/FaultSweep.h"
 #include "tests/support/ProviderTest.h"
 
@@ -35,7 +36,16 @@ struct Reply {
 // Requests whose up-calls the scripted objects answer.
 class ElementConformsToProfileTest : public Testing::ProviderTest {
 protected:
-    ElementConformsToProfileTest() { broker_.setUpcalls(&objects_); }
+    ElementConformsToProfileTest()
+    {
+        broker_.setUpcalls(&objects_);
+        classes_.add(Class, {}, "CIM_ElementConformsToProfile");
+        classes_.add(ScriptedObjects::ProfileClass, {}, "CIM_RegisteredProfile");
+        classes_.add("CIM_RegisteredProfile", {}, "CIM_ManagedElement");
+        classes_.add(ScriptedObjects::SensorClass, {}, "CIM_NumericSensor");
+        classes_.add("CIM_NumericSensor", {}, "CIM_Sensor");
+        broker_.setClassInformation(&classes_);
+    }
 
     const CMPIObjectPath* profile(const char* id = "ZUMLO:DSP1009")
     {
@@ -150,6 +160,7 @@ protected:
         return local(*association->key(role)->path());
     }
 
+    Testing::ClassTable classes_;
     ScriptedObjects objects_;
     const CMPIBroker* asked_ = broker();
 };
@@ -316,13 +327,20 @@ TEST_F(ElementConformsToProfileTest, FiltersThatNameTheAssociationAndItsEndsAreF
 
 TEST_F(ElementConformsToProfileTest, OtherFiltersLeadNowhereWithoutAnUpcall)
 {
-    for (const Filters& filters : {Filters{"CIM_SystemDevice"}, Filters{.resultClass = "CIM_Fan"},
-             Filters{.role = "ManagedElement"}, Filters{.resultRole = "ConformantStandard"}})
+    for (const Filters& filters : {Filters{"CIM_SystemDevice"}, Filters{.role = "ManagedElement"},
+             Filters{.resultRole = "ConformantStandard"}})
         EXPECT_THAT(pathsIn(associatorNames(profile(), filters)), IsEmpty());
     for (const Filters& filters :
         {Filters{"CIM_SystemDevice"}, Filters{.role = "ConformantStandard"}})
         EXPECT_THAT(pathsIn(referenceNames(sensor("CPU"), filters)), IsEmpty());
     EXPECT_THAT(objects_.calls, IsEmpty());
+}
+
+TEST_F(ElementConformsToProfileTest, AResultClassThatTheFarEndIsNotOfLeadsNowhere)
+{
+    for (const char* const resultClass : {"CIM_Fan", "CIM_RegisteredProfile"})
+        EXPECT_THAT(pathsIn(associatorNames(profile(), {.resultClass = resultClass})), IsEmpty());
+    EXPECT_THAT(pathsIn(associatorNames(sensor("CPU"), {.resultClass = "CIM_Sensor"})), IsEmpty());
 }
 
 TEST_F(ElementConformsToProfileTest, WithoutABrokerThereIsNoProvider)

@@ -4,6 +4,7 @@
 
 #include "host/broker/String.h"
 #include "tests/host/broker/BrokerTest.h"
+#include "tests/support/ClassTable.h"
 
 namespace HostTests {
 
@@ -40,6 +41,30 @@ TEST_F(ObjectPathTest, TakesOtherNames)
     EXPECT_EQ(textOf(CMGetClassName(made, nullptr)), "Other_Class");
     EXPECT_EQ(CMSetClassName(made, nullptr).rc, CMPI_RC_ERR_INVALID_PARAMETER);
     EXPECT_EQ(textOf(CMGetClassName(made, nullptr)), "Other_Class");
+}
+
+TEST_F(ObjectPathTest, ItsClassIsItselfAndEachOfItsSuperclasses)
+{
+    Testing::ClassTable classes;
+    classes.add("Test_Class", {}, "Test_Base");
+    classes.add("Test_Base", {}, "Test_Root");
+    broker.setClassInformation(&classes);
+    for (const char* const name : {"Test_Class", "TEST_BASE", "test_root"})
+        EXPECT_TRUE(CMClassPathIsA(mb, path(), name, &rc)) << name;
+    for (const char* const name : {"Test_Other", ""})
+        EXPECT_FALSE(CMClassPathIsA(mb, path(), name, &rc)) << name;
+    EXPECT_FALSE(CMClassPathIsA(mb, path("Test_Base"), "Test_Class", &rc));
+    EXPECT_FALSE(CMClassPathIsA(mb, path("Unknown"), "Test_Root", &rc));
+    EXPECT_EQ(rc.rc, CMPI_RC_OK);
+    EXPECT_FALSE(CMClassPathIsA(mb, path(), nullptr, &rc));
+    EXPECT_EQ(rc.rc, CMPI_RC_ERR_INVALID_PARAMETER);
+}
+
+TEST_F(ObjectPathTest, WithoutClassInformationItsClassIsOnlyItself)
+{
+    EXPECT_TRUE(CMClassPathIsA(mb, path(), "test_class", &rc));
+    EXPECT_FALSE(CMClassPathIsA(mb, path(), "Test_Base", &rc));
+    EXPECT_EQ(rc.rc, CMPI_RC_OK);
 }
 
 TEST_F(ObjectPathTest, ANameReadEarlierStaysAsItWas)

@@ -186,7 +186,7 @@ protected:
 TEST_F(TablesTest, OfferWhatShippedProvidersCallAndRefuseTheRest)
 {
     expectAnswers(*mb->bft, ".---o-----o-------");
-    expectAnswers(*mb->eft, "oo-oo---------o-----");
+    expectAnswers(*mb->eft, "oo-oo----o----o-----");
     expectAnswers(*mb->xft, "..-------.-......---");
     expectAnswers(*mb->mft, "--............");
     expectAnswers(Host::String::functions, "--o");
