@@ -4,12 +4,9 @@
 
 #include "host/broker/Array.h"
 #include "host/broker/Broker.h"
-#include "host/broker/CollectedResult.h"
 #include "host/broker/Instance.h"
-#include "host/broker/ObjectPath.h"
-#include "host/broker/Request.h"
-#include "host/broker/Result.h"
 #include "tests/providers/Factories.h"
+#include "tests/providers/SensorEnumeration.h"
 #include "tests/support/Environment.h"
 #include "tests/support/MountNamespace.h"
 
@@ -35,16 +32,9 @@ protected:
     // Returns the readings by device identifier.
     std::map<std::string, std::int64_t> readings()
     {
-        Host::Request request(broker_);
-        Host::CollectedResult answer;
-        Host::Result result(answer);
-        const CMPIStatus status =
-            mi_->ft->enumerateInstances(mi_, request.context().handle(), result.handle(),
-                request.makePath("root/cimv2", "ZUMLO_NumericSensor").handle(), nullptr);
-        EXPECT_EQ(status.rc, CMPI_RC_OK);
-        EXPECT_TRUE(answer.isDone());
+        const Testing::SensorEnumeration sensors(broker_, mi_);
         std::map<std::string, std::int64_t> found;
-        for (const Host::Instance* const sensor : answer.instances())
+        for (const Host::Instance* const sensor : sensors.instances())
             if (!hasLostCommunication(*sensor))
                 found[std::string(*sensor->property("DeviceID")->text())] =
                     *sensor->property("CurrentReading")->signedInteger();

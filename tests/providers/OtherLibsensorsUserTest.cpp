@@ -4,11 +4,8 @@
 // another plugin does.
 
 #include "host/broker/Broker.h"
-#include "host/broker/CollectedResult.h"
-#include "host/broker/ObjectPath.h"
-#include "host/broker/Request.h"
-#include "host/broker/Result.h"
 #include "tests/providers/Factories.h"
+#include "tests/providers/SensorEnumeration.h"
 #include "tests/support/Environment.h"
 #include "tests/support/MountNamespace.h"
 
@@ -94,17 +91,7 @@ public:
     }
 
     // Returns the number of sensors in the answer to EnumInstances.
-    std::size_t sensors()
-    {
-        Host::Request request(broker_);
-        Host::CollectedResult answer;
-        Host::Result result(answer);
-        const CMPIStatus status =
-            mi_->ft->enumerateInstances(mi_, request.context().handle(), result.handle(),
-                request.makePath("root/cimv2", "ZUMLO_NumericSensor").handle(), nullptr);
-        EXPECT_EQ(status.rc, CMPI_RC_OK);
-        return answer.instances().size();
-    }
+    std::size_t sensors() { return Testing::SensorEnumeration(broker_, mi_).instances().size(); }
 
 private:
     Host::Broker broker_;

@@ -41,6 +41,15 @@ protected:
         start();
     }
 
+    // Returns a client whose wrong password the server has not refused yet.
+    HttpClient connectSuspended()
+    {
+        HttpClient guesser = connect();
+        guesser.send(post(wrong));
+        EXPECT_FALSE(guesser.hasReplyWithin(300ms));
+        return guesser;
+    }
+
     // Sends a wrong password from two clients at once.
     void guessTwiceAtATime()
     {
@@ -210,9 +219,7 @@ TEST_F(SignInTest, WhoIsSignedInNeedNotWaitForThoseWhoGuess)
     HttpClient client = connect();
     client.send(post(right));
     EXPECT_EQ(client.receive().status, 200);
-    HttpClient guesser = connect();
-    guesser.send(post(wrong));
-    EXPECT_FALSE(guesser.hasReplyWithin(200ms));
+    HttpClient guesser = connectSuspended();
     const auto begin = std::chrono::steady_clock::now();
     client.send(post(right));
     EXPECT_EQ(client.receive().status, 200);
@@ -232,9 +239,7 @@ TEST_F(SignInTest, WhoWaitsTooLongIsToldWhenToComeAgain)
 {
     limits.signInDelay = 60s;
     start();
-    HttpClient guesser = connect();
-    guesser.send(post(wrong));
-    EXPECT_FALSE(guesser.hasReplyWithin(300ms));
+    HttpClient guesser = connectSuspended();
     const HttpReply reply = ask(post(right));
     EXPECT_EQ(reply.status, 503);
     EXPECT_EQ(reply.body, "too many sign-ins have failed\n");
@@ -246,9 +251,7 @@ TEST_F(SignInTest, ClientsThatLeaveAreNotWaitedFor)
 {
     startWithLongWaits();
     {
-        HttpClient guesser = connect();
-        guesser.send(post(wrong));
-        EXPECT_FALSE(guesser.hasReplyWithin(300ms));
+        HttpClient guesser = connectSuspended();
         HttpClient resetting = connect();
         resetting.send(post(wrong));
         HttpClient leaving = connect();
@@ -263,9 +266,7 @@ TEST_F(SignInTest, ClientsThatLeaveAreNotWaitedFor)
 TEST_F(SignInTest, ServerThatStopsDoesNotWaitForThoseWhoGuess)
 {
     startWithLongWaits();
-    HttpClient guesser = connect();
-    guesser.send(post(wrong));
-    EXPECT_FALSE(guesser.hasReplyWithin(300ms));
+    HttpClient guesser = connectSuspended();
     HttpClient behind = connect();
     behind.send(post(right));
     EXPECT_FALSE(behind.hasReplyWithin(100ms));
