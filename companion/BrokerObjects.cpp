@@ -10,19 +10,24 @@ namespace Vorn::Companion {
 
 namespace {
 
-// An object manager may copy a whole CMPIValue from the address it is passed, whatever the type:
-// all but texts are such values.
-
-// The value has no place for a path that is const; the broker copies the path.
+// Returns the path as a value, which has no place for one that is const; the broker copies the
+// path.
 CMPIValue referenceTo(const CMPIObjectPath* path)
 {
     return {.ref = const_cast<CMPIObjectPath*>(path)};
 }
 
-const char* charactersOf(const CMPIString* string)
+// The value is a whole CMPIValue, or characters: an object manager may copy one from the address
+// whatever the type.
+
+bool storeKey(const CMPIObjectPath* path, const char* name, const void* value, CMPIType type)
 {
-    // The slot itself: header sets differ in the convenience function's arguments.
-    return isUsable(string) ? string->ft->getCharPtr(string, nullptr) : nullptr;
+    return isUsable(path) && CMAddKey(path, name, value, type).rc == CMPI_RC_OK;
+}
+
+bool storeProperty(const CMPIInstance* instance, const char* name, const void* value, CMPIType type)
+{
+    return isUsable(instance) && CMSetProperty(instance, name, value, type).rc == CMPI_RC_OK;
 }
 
 void setList(const CMPIBroker* broker, const CMPIInstance* instance, const char* name,
@@ -33,16 +38,11 @@ void setList(const CMPIBroker* broker, const CMPIInstance* instance, const char*
         return;
     const CMPIStatus set = CMSetArrayElementAt(array, 0, &element, type);
     const CMPIValue value = {.array = array};
-    if (set.rc == CMPI_RC_OK && isUsable(array) && isUsable(instance))
-        CMSetProperty(instance, name, &value, static_cast<CMPIType>(type | CMPI_ARRAY));
+    if (set.rc == CMPI_RC_OK && isUsable(array))
+        storeProperty(instance, name, &value, static_cast<CMPIType>(type | CMPI_ARRAY));
 }
 
 } // namespace
-
-const char* nameSpaceOf(const CMPIObjectPath* path)
-{
-    return isUsable(path) ? charactersOf(CMGetNameSpace(path, nullptr)) : nullptr;
-}
 
 bool isOfClass(const CMPIObjectPath* path, const char* className)
 {
@@ -64,33 +64,30 @@ CMPIObjectPath* newPath(
 
 bool addKey(const CMPIObjectPath* path, const char* name, const char* text)
 {
-    return isUsable(path) && CMAddKey(path, name, text, CMPI_chars).rc == CMPI_RC_OK;
+    return storeKey(path, name, text, CMPI_chars);
 }
 
 bool addKey(const CMPIObjectPath* path, const char* name, const CMPIObjectPath* reference)
 {
     const CMPIValue value = referenceTo(reference);
-    return isUsable(path) && isUsable(reference) &&
-           CMAddKey(path, name, &value, CMPI_ref).rc == CMPI_RC_OK;
+    return isUsable(reference) && storeKey(path, name, &value, CMPI_ref);
 }
 
 bool setText(const CMPIInstance* instance, const char* name, const char* text)
 {
-    return isUsable(instance) && CMSetProperty(instance, name, text, CMPI_chars).rc == CMPI_RC_OK;
+    return storeProperty(instance, name, text, CMPI_chars);
 }
 
 bool setReference(const CMPIInstance* instance, const char* name, const CMPIObjectPath* reference)
 {
     const CMPIValue value = referenceTo(reference);
-    return isUsable(instance) && isUsable(reference) &&
-           CMSetProperty(instance, name, &value, CMPI_ref).rc == CMPI_RC_OK;
+    return isUsable(reference) && storeProperty(instance, name, &value, CMPI_ref);
 }
 
 void setCode(const CMPIInstance* instance, const char* name, std::uint16_t code)
 {
     const CMPIValue value = {.uint16 = code};
-    if (isUsable(instance))
-        CMSetProperty(instance, name, &value, CMPI_uint16);
+    storeProperty(instance, name, &value, CMPI_uint16);
 }
 
 void setCodes(

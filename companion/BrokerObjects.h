@@ -1,28 +1,18 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Objects made through the broker, which owns them, and read from it. Any call of the broker may
-// return an unusable object: each is tested before each use.
+// Makes objects through the broker, which owns them. Any call of the broker may return an unusable
+// object: each is tested before each use.
 
 #pragma once
 
-#include <cmpidt.h>
-#include <cmpift.h>
+#include "platform/utilities/ObjectAccess.h"
 
 #include <cstdint>
 #include <string>
 
 namespace Vorn::Companion {
 
-// Returns whether the object is neither null nor without a handle.
-template <typename Object>
-bool isUsable(const Object* object)
-{
-    return object != nullptr && object->hdl != nullptr;
-}
-
-// Returns null when the path has none.
-const char* nameSpaceOf(const CMPIObjectPath* path);
-
+// Returns whether the path is of the class; case does not matter (DSP0004).
 bool isOfClass(const CMPIObjectPath* path, const char* className);
 
 // Returns a path without keys; null without a namespace and when the broker fails.

@@ -13,8 +13,8 @@ namespace Vorn::Companion {
 
 namespace {
 
-// Returns whether the object manager says that it has no such class there, or no provider of it.
-bool saysThatNobodyServesIt(const CMPIStatus& status)
+// Returns whether the status means that the namespace has no such class or no provider of it.
+bool isWithoutProvider(const CMPIStatus& status)
 {
     return status.rc == CMPI_RC_ERR_INVALID_NAMESPACE || status.rc == CMPI_RC_ERR_INVALID_CLASS ||
            status.rc == CMPI_RC_ERR_NOT_FOUND || status.rc == CMPI_RC_ERR_NOT_SUPPORTED;
@@ -46,7 +46,7 @@ std::vector<CMPIValue> Upcalls::elements(const std::string& nameSpace, const cha
         if (status.rc == CMPI_RC_OK && element.type == type)
             found.push_back(element.value);
     }
-    if (saysThatNobodyServesIt(status))
+    if (isWithoutProvider(status))
         return {};
     if (path == nullptr || status.rc != CMPI_RC_OK)
         throw std::runtime_error(

@@ -8,17 +8,6 @@
 
 namespace Vorn::SensorProfileProvider {
 
-const char* charactersOf(const CMPIString* string, CMPIStatus* rc)
-{
-    // The slot is called directly: header sets differ in the arguments of the macro.
-    return isUsable(string) ? string->ft->getCharPtr(string, rc) : nullptr;
-}
-
-const char* nameSpaceOf(const CMPIObjectPath* path, CMPIStatus* rc)
-{
-    return isUsable(path) ? charactersOf(CMGetNameSpace(path, rc), rc) : nullptr;
-}
-
 CMPIString* classNameOf(const CMPIObjectPath* path, CMPIStatus* rc)
 {
     return isUsable(path) ? CMGetClassName(path, rc) : nullptr;
@@ -44,9 +33,9 @@ void copyNameSpace(const CMPIObjectPath* path, const CMPIObjectPath* ref, CMPISt
         CMSetNameSpace(path, nameSpace);
 }
 
-bool isOfClass(const CMPIObjectPath* path, const char* className)
+bool isExactlyOfClass(const CMPIObjectPath* path, const char* className)
 {
-    const char* const characters = charactersOf(classNameOf(path, nullptr), nullptr);
+    const char* const characters = charactersOf(classNameOf(path, nullptr));
     return characters != nullptr && std::strcmp(characters, className) == 0;
 }
 

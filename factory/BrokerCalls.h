@@ -6,30 +6,17 @@
 
 #pragma once
 
-#include <cmpidt.h>
-#include <cmpift.h>
+#include "platform/utilities/ObjectAccess.h"
 
 #include <string>
 
 namespace Vorn::SensorProfileProvider {
 
-// Returns whether the object is not null and has a handle.
-template <typename Object>
-bool isUsable(const Object* object)
-{
-    return object != nullptr && object->hdl != nullptr;
-}
-
-// Returns the characters, valid as long as the string, or null when there are none.
-const char* charactersOf(const CMPIString* string, CMPIStatus* rc);
-
-// Returns null when the path has no namespace.
-const char* nameSpaceOf(const CMPIObjectPath* path, CMPIStatus* rc);
 // Returns null when the path is not usable.
 CMPIString* classNameOf(const CMPIObjectPath* path, CMPIStatus* rc);
 
-// Returns whether the class name of the path is exactly this one; case matters.
-bool isOfClass(const CMPIObjectPath* path, const char* className);
+// Returns whether the class name of the path is this one; case matters.
+bool isExactlyOfClass(const CMPIObjectPath* path, const char* className);
 
 // Makes a path without keys, with the namespace of `ref`, the class and the host.
 // `again` is the status for setting the namespace once more. Returns null when the broker fails.

@@ -151,7 +151,7 @@ public:
         if (const CMPIObjectPath* const path =
                 newPath(broker_, op, served_.name, factory.systemName(), &status)) {
             // Evaluated once, since a different answer later would swap the ends of the pairs.
-            const bool leadsToSensors = isOfClass(target, SensorClass);
+            const bool leadsToSensors = isExactlyOfClass(target, SensorClass);
             const FetchFailure failure = fetch(factory, target, leadsToSensors, farEnds, &status);
             if (failure.text == nullptr)
                 returnReferences(kind, rslt, op, path, leadsToSensors, farEnds);

@@ -20,7 +20,7 @@ FetchFailure fetchPaths(const AssociationRequest& request, SensorFactory& factor
 {
     if (leadsToSensors)
         return request.fetchSensorPaths(factory, op, paths, status);
-    if (isOfClass(target, SensorEnabledLogicalElementCapClass) &&
+    if (isExactlyOfClass(target, SensorEnabledLogicalElementCapClass) &&
         factory.getAllSensorEnabledLogicalElementCapCMPIObjPaths(
             request.broker(), op, paths, status))
         return {capabilitiesPathsFailed};
@@ -33,10 +33,10 @@ FetchFailure fetchInstances(const AssociationRequest& request, SensorFactory& fa
     std::vector<CMPIInstance*>& instances, CMPIStatus* status)
 {
     int result = 0;
-    if (isOfClass(target, SensorClass))
+    if (isExactlyOfClass(target, SensorClass))
         result = factory.getAllSensorCMPIInstances(
             request.broker(), op, properties, false, instances, status);
-    else if (isOfClass(target, SensorEnabledLogicalElementCapClass))
+    else if (isExactlyOfClass(target, SensorEnabledLogicalElementCapClass))
         result = factory.getAllSensorEnabledLogicalElementCapCMPIInstances(
             request.broker(), op, properties, false, instances, status);
     return {result ? sensorsFailed : nullptr};
@@ -65,8 +65,8 @@ CMPIStatus associators(const char* function, ResultKind kind, const CMPIResult* 
     const FetchFailure failure =
         wantsInstances
             ? fetchInstances(request, factory, op, target, properties, instances, &status)
-            : fetchPaths(
-                  request, factory, op, target, isOfClass(target, SensorClass), paths, &status);
+            : fetchPaths(request, factory, op, target, isExactlyOfClass(target, SensorClass), paths,
+                  &status);
     if (failure.text != nullptr) {
         request.marks().failure(failure.text);
     } else {

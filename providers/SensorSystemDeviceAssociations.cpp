@@ -83,14 +83,14 @@ CMPIStatus associators(const char* function, ResultKind kind, const CMPIContext*
         request.marks().exit();
         return ok; // another provider's source or association
     }
-    if (isOfClass(target, ComputerSystemClass)) {
+    if (isExactlyOfClass(target, ComputerSystemClass)) {
         if (!isIncluded(resultClass, ComputerSystemClass, "CIM_ComputerSystem"))
             return ok; // without an exit mark
         if (!returnSystems(request, kind, ctx, rslt, target, &status)) {
             request.marks().failure(upcallFailed);
             return status; // without an exit mark
         }
-    } else if (isOfClass(target, SensorClass)) {
+    } else if (isExactlyOfClass(target, SensorClass)) {
         if (!isIncluded(resultClass, SensorClass, "CIM_NumericSensor"))
             return ok; // without an exit mark
         const FetchFailure failure =
@@ -110,7 +110,7 @@ FetchFailure fetchFarEnds(const AssociationRequest& request, const CMPIContext* 
 {
     if (leadsToSensors)
         return request.fetchSensorPaths(factory, op, farEnds, status);
-    if (!isOfClass(target, ComputerSystemClass))
+    if (!isExactlyOfClass(target, ComputerSystemClass))
         return {nullptr};
     const CMPIEnumeration* const systems =
         CBEnumInstanceNames(request.broker(), ctx, target, status);

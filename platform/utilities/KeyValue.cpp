@@ -2,7 +2,7 @@
 
 #include "platform/utilities/KeyValue.h"
 
-#include <cmpift.h>
+#include "platform/utilities/ObjectAccess.h"
 
 namespace Vorn {
 
@@ -32,7 +32,7 @@ KeyValue path(const CMPIObjectPath* reference)
     return reference;
 }
 
-std::string_view charactersOf(const char* characters)
+std::string_view viewOf(const char* characters)
 {
     return characters != nullptr ? std::string_view(characters) : std::string_view();
 }
@@ -40,7 +40,7 @@ std::string_view charactersOf(const char* characters)
 // Returns the datetime format of DSP0004, section 5.2.4.
 std::string_view standardForm(CMPIDateTime* dateTime)
 {
-    if (dateTime == nullptr || dateTime->hdl == nullptr || dateTime->ft == nullptr)
+    if (!isUsable(dateTime))
         return {};
     CMPIStatus status{};
     CMPIString* const form = dateTime->ft->getStringFormat(dateTime, &status);
@@ -77,7 +77,7 @@ KeyValue presentValue(CMPIType type, const CMPIValue& value)
     case CMPI_string:
         return text(textOf(value.string));
     case CMPI_chars:
-        return text(charactersOf(value.chars));
+        return text(viewOf(value.chars));
     case CMPI_dateTime:
         return text(standardForm(value.dateTime));
     case CMPI_ref:
@@ -91,11 +91,9 @@ KeyValue presentValue(CMPIType type, const CMPIValue& value)
 
 std::string_view textOf(CMPIString* string)
 {
-    if (string == nullptr || string->hdl == nullptr || string->ft == nullptr)
-        return {};
     CMPIStatus status{};
-    const char* const characters = string->ft->getCharPtr(string, &status);
-    return status.rc == CMPI_RC_OK ? charactersOf(characters) : std::string_view();
+    const char* const characters = charactersOf(string, &status);
+    return status.rc == CMPI_RC_OK ? viewOf(characters) : std::string_view();
 }
 
 KeyValue keyValue(const CMPIData& data)

@@ -2,9 +2,8 @@
 
 #include "platform/text/Trim.h"
 #include "platform/utilities/KeyValue.h"
+#include "platform/utilities/ObjectAccess.h"
 #include "platform/utilities/ProviderUtilities.h"
-
-#include <cmpift.h>
 
 #include <algorithm>
 #include <optional>
@@ -22,11 +21,6 @@ struct Key {
     KeyValue value;
 };
 
-bool isUsable(const CMPIObjectPath* path)
-{
-    return path != nullptr && path->hdl != nullptr && path->ft != nullptr;
-}
-
 std::string_view className(const CMPIObjectPath* path)
 {
     CMPIStatus status{};
@@ -34,7 +28,7 @@ std::string_view className(const CMPIObjectPath* path)
     return status.rc == CMPI_RC_OK ? textOf(name) : std::string_view();
 }
 
-std::string_view namespaceOf(const CMPIObjectPath* path)
+std::string_view trimmedNamespace(const CMPIObjectPath* path)
 {
     CMPIStatus status{};
     CMPIString* const name = path->ft->getNameSpace(path, &status);
@@ -43,8 +37,8 @@ std::string_view namespaceOf(const CMPIObjectPath* path)
 
 bool sameNamespace(const CMPIObjectPath* a, const CMPIObjectPath* b)
 {
-    const std::string_view namespaceA = namespaceOf(a);
-    const std::string_view namespaceB = namespaceOf(b);
+    const std::string_view namespaceA = trimmedNamespace(a);
+    const std::string_view namespaceB = trimmedNamespace(b);
     return namespaceA.empty() || namespaceB.empty() || isSameName(namespaceA, namespaceB);
 }
 
