@@ -51,7 +51,7 @@ bool isOfClass(const CMPIObjectPath* path, const char* className)
     return actual != nullptr && isSameName(actual, className);
 }
 
-CMPIObjectPath* newPath(
+CMPIObjectPath* newPathIn(
     const CMPIBroker* broker, const char* nameSpace, const char* className, const std::string& host)
 {
     if (nameSpace == nullptr)

@@ -15,8 +15,8 @@ namespace Vorn::Companion {
 // Returns whether the path is of the class; case does not matter (DSP0004).
 bool isOfClass(const CMPIObjectPath* path, const char* className);
 
-// Returns a path without keys; null without a namespace and when the broker fails.
-CMPIObjectPath* newPath(const CMPIBroker* broker, const char* nameSpace, const char* className,
+// Returns a path without keys in the namespace; null when that is null or the broker fails.
+CMPIObjectPath* newPathIn(const CMPIBroker* broker, const char* nameSpace, const char* className,
     const std::string& host);
 
 // Return whether the broker set the value.

@@ -55,7 +55,7 @@ CMPIObjectPath* makePath(
     const CMPIBroker* broker, const CMPIObjectPath* ref, const ComputerSystem& system)
 {
     CMPIObjectPath* const path =
-        newPath(broker, nameSpaceOf(ref), ComputerSystemClass, system.name);
+        newPathIn(broker, nameSpaceOf(ref), ComputerSystemClass, system.name);
     const bool isWhole = addKey(path, creationClassNameKey, ComputerSystemClass) &&
                          addKey(path, nameKey, system.name.c_str()) && isUsable(path);
     return isWhole ? path : nullptr;

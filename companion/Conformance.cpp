@@ -17,7 +17,7 @@ namespace Vorn::Companion {
 
 namespace {
 
-// Where object managers have the registrations of profiles, and CIM_Namespace.
+// Object managers have the registrations of profiles, and CIM_Namespace, in one of these.
 constexpr std::array interopNamespaces = {"root/interop", "root/PG_InterOp"};
 
 // Returns null where the object manager serves no registration.

@@ -1,8 +1,8 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Which sensors conform to the profile, and where they and its registration are. They are found by
-// up-calls: the sensors may be registered in any namespace, and object managers differ in the one
-// of the registration.
+// Finds the registration of the profile and the sensors that conform to it, by up-calls: the
+// sensors may be registered in any namespace, and object managers differ in that of the
+// registration.
 
 #pragma once
 

@@ -5,9 +5,9 @@
 // registration of the profile that sensors are scoped by. The ends are in different namespaces; as
 // DSP1033 requires, the association is in both.
 
-#include "companion/Answer.h"
 #include "companion/Conformance.h"
 #include "companion/RegisteredProfile.h"
+#include "companion/ResultWriter.h"
 #include "platform/utilities/ProviderUtilities.h"
 
 #include <array>
@@ -19,7 +19,7 @@ namespace {
 
 constexpr const char* ConformsClass = "ZUMLO_SensorElementConformsToProfile";
 
-// The names of the references.
+// These are the names of the references.
 constexpr const char* standardRole = "ConformantStandard";
 constexpr const char* elementRole = "ManagedElement";
 
@@ -28,7 +28,7 @@ std::atomic<const CMPIBroker*> theBroker = nullptr;
 
 enum class ResultKind { instances, paths };
 
-// The filters of an association operation (DSP0200, Associators); null or empty where the client
+// The filters of an association operation (DSP0200, Associators) are null or empty where the client
 // set none.
 struct Filters {
     const char* associationClass = nullptr;
@@ -47,20 +47,21 @@ bool admits(const char* filter, const char* name)
     return isUnset(filter) || isSameName(name, filter);
 }
 
-// One request to the provider.
-class Request {
+// Answers one request to the provider.
+class ConformanceRequest {
 public:
-    Request(const CMPIBroker* broker, const CMPIContext* context, const CMPIResult* result,
-        const CMPIObjectPath* target, ResultKind kind, const char** properties)
+    ConformanceRequest(const CMPIBroker* broker, const CMPIContext* context,
+        const CMPIResult* result, const CMPIObjectPath* target, ResultKind kind,
+        const char** properties)
         : broker_(broker), target_(target), kind_(kind), properties_(properties),
-          upcalls_(broker, context), answer_(broker, result)
+          upcalls_(broker, context), result_(broker, result)
     {
     }
 
     CMPIStatus enumerate()
     {
         addAssociations(wholeConformance(upcalls_));
-        return answer_.finish();
+        return result_.finish();
     }
 
     CMPIStatus get()
@@ -72,27 +73,27 @@ public:
         if (found.sensors.empty())
             return failure(broker_, CMPI_RC_ERR_NOT_FOUND, "no such conformance");
         addAssociations(found);
-        return answer_.finish();
+        return result_.finish();
     }
 
     CMPIStatus references(const Filters& filters)
     {
         if (isNear(filters))
             addAssociations(conformanceOf(upcalls_, target_));
-        return answer_.finish();
+        return result_.finish();
     }
 
     CMPIStatus associators(const Filters& filters)
     {
         if (!isNear(filters) ||
             !admits(filters.resultRole, isFromProfile_ ? elementRole : standardRole))
-            return answer_.finish();
+            return result_.finish();
         const Conformance found = conformanceOf(upcalls_, target_);
         if (!found.sensors.empty() &&
             isOfAdmittedClass(
                 isFromProfile_ ? found.sensors.front() : found.profile, filters.resultClass))
             addFarEnds(found);
-        return answer_.finish();
+        return result_.finish();
     }
 
 private:
@@ -113,7 +114,7 @@ private:
 
     const CMPIObjectPath* newAssociationPath() const
     {
-        return newPath(broker_, nameSpaceOf(target_), ConformsClass, getSystemName());
+        return newPathIn(broker_, nameSpaceOf(target_), ConformsClass, getSystemName());
     }
 
     const CMPIObjectPath* associationPath(
@@ -144,24 +145,24 @@ private:
     {
         for (const CMPIObjectPath* const sensor : found.sensors)
             if (kind_ == ResultKind::paths)
-                answer_.add(associationPath(found.profile, sensor));
+                result_.add(associationPath(found.profile, sensor));
             else
-                answer_.add(association(found.profile, sensor));
+                result_.add(association(found.profile, sensor));
     }
 
     void addFarEnds(const Conformance& found)
     {
         if (!isFromProfile_ && kind_ == ResultKind::paths)
-            answer_.add(found.profile);
+            result_.add(found.profile);
         else if (!isFromProfile_)
-            answer_.add(makeProfileInstance(broker_, found.profile, properties_));
+            result_.add(makeProfileInstance(broker_, found.profile, properties_));
         else if (kind_ == ResultKind::paths)
             for (const CMPIObjectPath* const sensor : found.sensors)
-                answer_.add(sensor);
+                result_.add(sensor);
         else
             for (const CMPIInstance* const sensor :
                 conformingSensors(upcalls_, found.profile, properties_))
-                answer_.add(sensor);
+                result_.add(sensor);
     }
 
     const CMPIBroker* broker_;
@@ -170,7 +171,7 @@ private:
     const char** properties_;
     const bool isFromProfile_ = isOfClass(target_, RegisteredProfileClass);
     Upcalls upcalls_;
-    Answer answer_;
+    ResultWriter result_;
 };
 
 // Calls `work` with a request.
@@ -180,7 +181,7 @@ CMPIStatus serve(const CMPIContext* context, const CMPIResult* result, const CMP
 {
     const CMPIBroker* const broker = theBroker;
     return guarded(broker, [&] {
-        Request request(broker, context, result, target, kind, properties);
+        ConformanceRequest request(broker, context, result, target, kind, properties);
         return work(request);
     });
 }
@@ -189,56 +190,60 @@ CMPIStatus enumerateNames(CMPIInstanceMI*, const CMPIContext* context, const CMP
     const CMPIObjectPath* target)
 {
     return serve(context, result, target, ResultKind::paths, nullptr,
-        [](Request& request) { return request.enumerate(); });
+        [](ConformanceRequest& request) { return request.enumerate(); });
 }
 
 CMPIStatus enumerate(CMPIInstanceMI*, const CMPIContext* context, const CMPIResult* result,
     const CMPIObjectPath* target, const char** properties)
 {
     return serve(context, result, target, ResultKind::instances, properties,
-        [](Request& request) { return request.enumerate(); });
+        [](ConformanceRequest& request) { return request.enumerate(); });
 }
 
 CMPIStatus get(CMPIInstanceMI*, const CMPIContext* context, const CMPIResult* result,
     const CMPIObjectPath* target, const char** properties)
 {
     return serve(context, result, target, ResultKind::instances, properties,
-        [](Request& request) { return request.get(); });
+        [](ConformanceRequest& request) { return request.get(); });
 }
 
 CMPIStatus associators(CMPIAssociationMI*, const CMPIContext* context, const CMPIResult* result,
     const CMPIObjectPath* target, const char* associationClass, const char* resultClass,
     const char* role, const char* resultRole, const char** properties)
 {
-    return serve(context, result, target, ResultKind::instances, properties, [&](Request& request) {
-        return request.associators({associationClass, resultClass, role, resultRole});
-    });
+    return serve(context, result, target, ResultKind::instances, properties,
+        [&](ConformanceRequest& request) {
+            return request.associators({associationClass, resultClass, role, resultRole});
+        });
 }
 
 CMPIStatus associatorNames(CMPIAssociationMI*, const CMPIContext* context, const CMPIResult* result,
     const CMPIObjectPath* target, const char* associationClass, const char* resultClass,
     const char* role, const char* resultRole)
 {
-    return serve(context, result, target, ResultKind::paths, nullptr, [&](Request& request) {
-        return request.associators({associationClass, resultClass, role, resultRole});
-    });
+    return serve(
+        context, result, target, ResultKind::paths, nullptr, [&](ConformanceRequest& request) {
+            return request.associators({associationClass, resultClass, role, resultRole});
+        });
 }
 
 CMPIStatus references(CMPIAssociationMI*, const CMPIContext* context, const CMPIResult* result,
     const CMPIObjectPath* target, const char* associationClass, const char* role,
     const char** properties)
 {
-    return serve(context, result, target, ResultKind::instances, properties, [&](Request& request) {
-        return request.references({.associationClass = associationClass, .role = role});
-    });
+    return serve(context, result, target, ResultKind::instances, properties,
+        [&](ConformanceRequest& request) {
+            return request.references({.associationClass = associationClass, .role = role});
+        });
 }
 
 CMPIStatus referenceNames(CMPIAssociationMI*, const CMPIContext* context, const CMPIResult* result,
     const CMPIObjectPath* target, const char* associationClass, const char* role)
 {
-    return serve(context, result, target, ResultKind::paths, nullptr, [&](Request& request) {
-        return request.references({.associationClass = associationClass, .role = role});
-    });
+    return serve(
+        context, result, target, ResultKind::paths, nullptr, [&](ConformanceRequest& request) {
+            return request.references({.associationClass = associationClass, .role = role});
+        });
 }
 
 constexpr CMPIInstanceMIFT instanceHandlers = instanceTable(

@@ -1,6 +1,7 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// What the providers of this library share: they are read-only, and exceptions end at them.
+// The providers of this library share the table of a read-only instance provider, the body of their
+// factory functions and the conversion of exceptions to a status.
 
 #pragma once
 
@@ -16,7 +17,7 @@ namespace Vorn::Companion {
 inline constexpr CMPIStatus okStatus = {CMPI_RC_OK, nullptr};
 inline constexpr CMPIStatus notSupported = {CMPI_RC_ERR_NOT_SUPPORTED, nullptr};
 
-// The functions of an instance provider that reads.
+// An instance provider that only reads has these functions.
 struct InstanceReaders {
     decltype(CMPIInstanceMIFT::enumerateInstanceNames) enumerateNames;
     decltype(CMPIInstanceMIFT::enumerateInstances) enumerate;
@@ -41,8 +42,8 @@ constexpr CMPIInstanceMIFT instanceTable(const char* name, const InstanceReaders
     };
 }
 
-// Does what a factory function does: keeps the broker and returns the record; returns null without
-// a broker.
+// Implements a factory function: stores the broker and returns the record, or null without a
+// broker.
 template <typename Record>
 Record* createdWith(const CMPIBroker* broker, CMPIStatus* status,
     std::atomic<const CMPIBroker*>& kept, Record& record)

@@ -41,7 +41,7 @@ struct SensorsProfile {
 CMPIObjectPath* makeProfilePath(const CMPIBroker* broker, const char* nameSpace)
 {
     CMPIObjectPath* const path =
-        newPath(broker, nameSpace, RegisteredProfileClass, getSystemName());
+        newPathIn(broker, nameSpace, RegisteredProfileClass, getSystemName());
     return addKey(path, instanceIdKey, instanceId) && isUsable(path) ? path : nullptr;
 }
 

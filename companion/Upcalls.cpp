@@ -38,7 +38,7 @@ std::vector<CMPIValue> Upcalls::elements(const std::string& nameSpace, const cha
     std::vector<CMPIValue> found;
     CMPIStatus status = {CMPI_RC_OK, nullptr};
     const CMPIObjectPath* const path =
-        newPath(broker_, nameSpace.c_str(), className, getSystemName());
+        newPathIn(broker_, nameSpace.c_str(), className, getSystemName());
     const CMPIEnumeration* const all = path == nullptr ? nullptr : enumerate(path, &status);
     while (status.rc == CMPI_RC_OK && isUsable(all) && CMHasNext(all, &status)) {
         // The state of an element is ignored, since object managers differ in it.

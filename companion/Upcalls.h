@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// What a request learns of other providers, through the object manager.
+// Enumerates the instances of other providers through the object manager.
 
 #pragma once
 
@@ -11,8 +11,8 @@
 
 namespace Vorn::Companion {
 
-// The functions return objects of the broker. Where nobody serves the class in the namespace, there
-// are none. They throw std::runtime_error when the object manager fails in another way.
+// The functions return objects of the broker, or none where no provider serves the class in the
+// namespace. They throw std::runtime_error when the object manager fails in another way.
 class Upcalls {
 public:
     Upcalls(const CMPIBroker* broker, const CMPIContext* context)
@@ -23,7 +23,8 @@ public:
     // Returns the paths of the class's instances. Each has its namespace.
     std::vector<CMPIObjectPath*> names(const std::string& nameSpace, const char* className) const;
 
-    // The list of properties ends with a null and is null for all properties.
+    // Returns the class's instances. The list of properties ends with a null and is null for all
+    // properties.
     std::vector<CMPIInstance*> instances(
         const std::string& nameSpace, const char* className, const char** properties) const;
 

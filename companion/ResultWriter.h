@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Objects returned to the object manager.
+// Returns objects to the object manager.
 
 #pragma once
 
@@ -8,12 +8,16 @@
 
 namespace Vorn::Companion {
 
-// Returns all objects or an error: after a failure nothing more is returned.
-class Answer {
+// Writes objects to the result of a request. After a failure it writes nothing more, and the
+// request ends with the status of that failure.
+class ResultWriter {
 public:
-    Answer(const CMPIBroker* broker, const CMPIResult* result) : broker_(broker), result_(result) {}
+    ResultWriter(const CMPIBroker* broker, const CMPIResult* result)
+        : broker_(broker), result_(result)
+    {
+    }
 
-    // Return the object; null stands for one that the broker failed to make.
+    // Write the object; null stands for one that the broker failed to make.
     void add(const CMPIObjectPath* path)
     {
         if (isWanted(path))
