@@ -34,10 +34,7 @@ std::vector<Answer> askAll(const ObjectManager& manager, const std::vector<Reque
 Declarations declarationsIn(const ObjectManager& manager)
 {
     Declarations declarations;
-    for (const std::string name : {"ZUMLO_NumericSensor", "ZUMLO_ComputerSystem",
-             "ZUMLO_SensorEnabledLogicalElementCapabilities", "ZUMLO_SensorSystemDevice",
-             "ZUMLO_SensorElementCapabilities", "ZUMLO_SensorElementConformsToProfile",
-             "ZUMLO_SensorRegisteredProfile"})
+    for (const std::string& name : servedClasses)
         declarations[name] = ask({"gc", manager.url(name)}).objects.begin()->second;
     return declarations;
 }

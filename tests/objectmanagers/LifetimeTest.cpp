@@ -29,7 +29,6 @@ protected:
                                                              "/schema/demo-model.json"}});
         EXPECT_EQ(agents().size(), 0U);
         before_ = answers();
-        EXPECT_EQ(before_.size(), 5U);
         EXPECT_GT(agents().size(), 0U);
     }
     void TearDown() override { manager_.stop(); }
@@ -49,9 +48,7 @@ protected:
     std::vector<std::string> answers() const
     {
         std::vector<std::string> texts;
-        for (const std::string name : {"ZUMLO_NumericSensor", "ZUMLO_ComputerSystem",
-                 "ZUMLO_SensorEnabledLogicalElementCapabilities", "ZUMLO_SensorSystemDevice",
-                 "ZUMLO_SensorElementCapabilities"})
+        for (const std::string& name : servedClasses)
             texts.push_back(describe(ask({"ei", manager_.url(name)})));
         return texts;
     }
@@ -59,9 +56,9 @@ protected:
     // Disables or enables the providers in OpenPegasus.
     void forEachModule(const std::string& option) const
     {
-        for (const std::string module :
-            {"SensorProfileModule", "SensorProfileComputerSystemModule"})
-            manager_.command("/opt/openpegasus/bin/cimprovider", {option, "-m", module});
+        for (const std::string module : {"SensorProfileModule", "SensorProfileRegistrationModule",
+                 "SensorProfileComputerSystemModule"})
+            manager_.command("cimprovider", {option, "-m", module});
     }
 
     const ObjectManager& manager_ = *GetParam();

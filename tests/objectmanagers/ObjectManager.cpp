@@ -63,10 +63,11 @@ void ObjectManager::startWithProviders(const std::map<std::string, std::string>&
 }
 
 std::string ObjectManager::command(
-    const std::string& program, const std::vector<std::string>& arguments) const
+    const std::string& program, std::vector<std::string> arguments) const
 {
+    arguments.insert(arguments.begin(), program);
     const Ended ended =
-        run(arguments, {.program = program,
+        run(arguments, {.program = "/usr/bin/env",
                            .environment = {{"PEGASUS_HOME", "/opt/openpegasus"},
                                {"PATH", folder_ + "/bin:" + folder_ + "/sbin:/usr/bin:/bin"}}});
     if (ended.code != 0)
@@ -77,8 +78,8 @@ std::string ObjectManager::command(
 std::string ObjectManager::runRegister(
     std::vector<std::string> arguments, const std::filesystem::path& installation) const
 {
-    arguments.insert(arguments.end(), {"--object-manager", name_});
-    arguments.insert(arguments.end(), registerOptions_.begin(), registerOptions_.end());
+    arguments.insert(arguments.begin(), registerOptions_.begin(), registerOptions_.end());
+    arguments.insert(arguments.begin(), {"--object-manager", name_});
     return command(installation / "sbin/sensor-profile-register", arguments);
 }
 

@@ -13,6 +13,11 @@
 
 namespace Testing {
 
+inline const std::vector<std::string> servedClasses = {"ZUMLO_NumericSensor",
+    "ZUMLO_ComputerSystem", "ZUMLO_SensorEnabledLogicalElementCapabilities",
+    "ZUMLO_SensorSystemDevice", "ZUMLO_SensorElementCapabilities",
+    "ZUMLO_SensorElementConformsToProfile", "ZUMLO_SensorRegisteredProfile"};
+
 // Functions that run a command throw std::runtime_error with what it printed when it fails.
 class ObjectManager {
 public:
@@ -49,10 +54,10 @@ public:
     void startWithProviders(const std::map<std::string, std::string>& environment) const;
 
     // Runs one of its commands; returns what it printed.
-    std::string command(
-        const std::string& program, const std::vector<std::string>& arguments) const;
+    std::string command(const std::string& program, std::vector<std::string> arguments) const;
 
-    // Runs sensor-profile-register of an installation, with the folders of this object manager.
+    // Runs sensor-profile-register of an installation, with the folders of this object manager
+    // unless the arguments name others. Returns what it printed.
     std::string runRegister(std::vector<std::string> arguments,
         const std::filesystem::path& installation = movedInstallation()) const;
 

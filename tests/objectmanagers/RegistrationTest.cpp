@@ -3,76 +3,35 @@
 // sensor-profile-register in OpenPegasus and sfcb.
 
 #include "tests/objectmanagers/Answer.h"
+#include "tests/objectmanagers/FormerRelease.h"
 #include "tests/objectmanagers/ObjectManager.h"
 #include "tests/support/Texts.h"
+#include "tests/tools/ChildProcess.h"
 
-#include <gtest/gtest.h>
+#include <gmock/gmock.h>
 
 #include <fstream>
 #include <set>
-#include <sstream>
 
 namespace {
 
 using namespace Testing;
 namespace fs = std::filesystem;
 
-// An installation whose classes are changed.
-class ChangedInstallation {
-public:
-    ChangedInstallation() { fs::copy(movedInstallation(), prefix(), fs::copy_options::recursive); }
-
-    // Makes them those of an earlier release.
-    void downgrade() const
-    {
-        std::istringstream lines(contentOf(movedInstallation() / classes_));
-        std::ofstream changed(prefix() / classes_);
-        for (std::string line; std::getline(lines, line);) {
-            if (const auto at = line.find("Version(\""); at != std::string::npos)
-                line.replace(at, line.find(')', at) - at, "Version(\"0.0.1\"");
-            changed << line << '\n';
-            if (line.starts_with("class ZUMLO_NumericSensor"))
-                changed << "string FormerProperty;\n";
-        }
-    }
-
-    void upgrade() const
-    {
-        fs::copy_file(movedInstallation() / classes_, prefix() / classes_,
-            fs::copy_options::overwrite_existing);
-    }
-
-    // Makes them such that no object manager compiles them.
-    void damage() const { std::ofstream(prefix() / classes_, std::ios::app) << "class {\n"; }
-
-    fs::path prefix() const { return folder_.path() / "installation"; }
-
-private:
-    const fs::path classes_ = "share/sensor-profile/sensor-profile.mof";
-    TemporaryFolder folder_;
-};
-
-// What an object manager keeps of registrations, but for the classes of this product.
-struct Registrations {
-    std::set<std::string> classes;
-    std::string providers;
-    std::vector<std::string> libraries;
-    std::vector<std::string> staged;
-
-    bool operator==(const Registrations&) const = default;
-};
-
 class RegistrationTest : public testing::TestWithParam<const ObjectManager*> {
 protected:
-    void SetUp() override
+    void SetUp() override { reset(); }
+    void TearDown() override { manager_.stop(); }
+
+    bool isSfcb() const { return &manager_ == &ObjectManager::sfcb(); }
+
+    // Makes it what it was when it was installed. The commands of OpenPegasus need it running.
+    void reset() const
     {
         manager_.reset();
         if (!isSfcb())
             start();
     }
-    void TearDown() override { manager_.stop(); }
-
-    bool isSfcb() const { return &manager_ == &ObjectManager::sfcb(); }
 
     void start() const
     {
@@ -81,15 +40,26 @@ protected:
                                                              "/schema/demo-model.json"}});
     }
 
-    // sfcb takes notice when it starts.
-    void runRegister(const std::vector<std::string>& arguments,
-        const fs::path& installation = movedInstallation()) const
+    // Makes sfcb read its registrations, which it does when it starts.
+    void restart() const
+    {
+        if (!isSfcb())
+            return;
+        manager_.stop();
+        start();
+    }
+
+    // Returns the folder of provider libraries of an administrator who registered release 0.2.0:
+    // the library of the computer system could not be beside that of OpenPegasus of the same name.
+    std::string folderOfFormerLibraries() const
     {
         if (isSfcb())
-            manager_.stop();
-        manager_.runRegister(arguments, installation);
-        if (isSfcb())
-            start();
+            return manager_.folder() + "/lib/cmpi";
+        const std::string folder = manager_.folder() + "/providers";
+        fs::create_directory(folder);
+        manager_.command(
+            "cimconfig", {"-s", "providerDir=" + folder + ':' + manager_.folder() + "/lib", "-c"});
+        return folder;
     }
 
     std::size_t count(const std::string& className, const std::string& space = "root/cimv2") const
@@ -99,6 +69,26 @@ protected:
     Answer names(const std::string& className, const std::string& space = "root/cimv2") const
     {
         return ask({"ein", manager_.url(className, space)});
+    }
+
+    // Returns the value of the class's qualifier Version.
+    std::string versionOf(const std::string& className) const
+    {
+        const std::string xml =
+            run({"-dx", "gc", manager_.url(className)}, {.program = "/usr/bin/wbemcli"}).err;
+        const std::string qualifier = xml.substr(xml.find("<QUALIFIER NAME=\"Version\""));
+        const std::size_t value = qualifier.find("<VALUE>") + 7;
+        return qualifier.substr(value, qualifier.find('<', value) - value);
+    }
+
+    // Returns the instances and the declarations of our classes.
+    std::string answers() const
+    {
+        std::string texts;
+        for (const std::string& name : servedClasses)
+            for (const std::string operation : {"ei", "gc"})
+                texts += describe(ask({operation, manager_.url(name)}));
+        return texts;
     }
 
     // Returns the paths of the sensors that conform to the registered profile.
@@ -133,24 +123,37 @@ protected:
             "/opt/openpegasus/bin/cimmof", {"-n", space, folder_.write("cim.mof", text)});
     }
 
-    Registrations registrations() const
+    // Returns what the object manager keeps of registrations, but for classes. sfcb need not run.
+    std::string registrations() const
     {
-        Registrations found;
-        for (const auto& [name, properties] : ask({"ecn", manager_.url("")}).objects)
-            if (isSfcb() || !name.starts_with("ZUMLO_"))
-                found.classes.insert(name);
         const fs::path folder = manager_.folder();
-        if (isSfcb()) {
-            found.providers = contentOf(folder / "var/lib/sfcb/registration/providerRegister");
-            found.libraries = filesBelow(folder / "lib/cmpi");
-            found.staged = filesBelow(folder / "var/lib/sfcb/stage");
-        } else {
-            for (const std::string name :
-                {"PG_ProviderModule", "PG_Provider", "PG_ProviderCapabilities"})
-                found.providers += describe(ask({"ei", manager_.url(name, "root/PG_InterOp")}));
-            found.libraries = filesBelow(folder / "lib");
-        }
+        if (isSfcb())
+            return contentOf(folder / "var/lib/sfcb/registration/providerRegister") +
+                   listOf(folder / "lib/cmpi") + listOf(folder / "var/lib/sfcb/stage");
+        std::string found = listOf(folder / "lib") + listOf(folder / "providers");
+        for (const std::string name :
+            {"PG_ProviderModule", "PG_Provider", "PG_ProviderCapabilities"})
+            found += describe(ask({"ei", manager_.url(name, "root/PG_InterOp")}));
         return found;
+    }
+
+    // Returns the paths of the files below a folder, each on a line. There may be no such folder.
+    static std::string listOf(const fs::path& folder)
+    {
+        std::string list;
+        if (fs::exists(folder))
+            for (const std::string& name : filesBelow(folder))
+                list += (folder / name).string() + '\n';
+        return list;
+    }
+
+    // Returns the names of the classes at the top of the hierarchy.
+    std::set<std::string> classNames() const
+    {
+        std::set<std::string> names;
+        for (const auto& [name, properties] : ask({"ecn", manager_.url("")}).objects)
+            names.insert(name);
+        return names;
     }
 
     const ObjectManager& manager_ = *GetParam();
@@ -159,55 +162,63 @@ protected:
 
 TEST_P(RegistrationTest, MovesToAnotherNamespace)
 {
-    runRegister({"register"});
-    EXPECT_EQ(count("ZUMLO_SensorSystemDevice"), 40U);
-    EXPECT_EQ(conformingSensors(), sensorsIn("root/cimv2"));
+    manager_.runRegister({"register"});
     if (!isSfcb())
         compileAncestors("root/sensors");
-    runRegister({"register", "--namespace", "root/sensors"});
+    manager_.runRegister({"register", "--namespace", "root/sensors"});
+    restart();
     EXPECT_EQ(count("ZUMLO_SensorSystemDevice", "root/sensors"), 40U);
     EXPECT_EQ(conformingSensors(), sensorsIn("root/sensors"));
     EXPECT_EQ(conformingSensors().size(), 40U);
-    // OpenPegasus keeps the classes, which nobody serves.
+    // OpenPegasus keeps the classes, which no provider serves.
     EXPECT_EQ(count("ZUMLO_NumericSensor"), 0U);
     EXPECT_EQ(names("ZUMLO_NumericSensor").error, isSfcb() ? 5 : 0);
 }
 
-TEST_P(RegistrationTest, ReplacesTheClassesOfAnEarlierRelease)
+TEST_P(RegistrationTest, ReplacesTheFormerReleaseAndIsRemovedWhole)
 {
-    const auto declared = [this] {
-        return ask({"gc", manager_.url("ZUMLO_NumericSensor")}).objects.begin()->second;
-    };
-    const ChangedInstallation installation;
-    installation.downgrade();
-    runRegister({"register"}, installation.prefix());
-    EXPECT_TRUE(declared().contains("FormerProperty"));
-    EXPECT_EQ(count("ZUMLO_NumericSensor"), 40U);
-    installation.upgrade();
-    runRegister({"register"}, installation.prefix());
-    EXPECT_FALSE(declared().contains("FormerProperty"));
+    const std::string folder = folderOfFormerLibraries();
+    const FormerRelease release;
+    const std::string before = registrations();
+    release.registerIn(manager_, folder);
+    restart();
+    EXPECT_EQ(versionOf("ZUMLO_NumericSensor"), FormerRelease::version);
+    EXPECT_EQ(count("ZUMLO_ComputerSystem"), 1U);
     EXPECT_EQ(count("ZUMLO_SensorSystemDevice"), 40U);
-}
 
-TEST_P(RegistrationTest, LeavesNothingBehind)
-{
-    if (isSfcb())
-        start();
-    const Registrations before = registrations();
-    runRegister({"register"});
-    EXPECT_EQ(count("ZUMLO_SensorSystemDevice"), 40U);
-    EXPECT_NE(registrations().providers, before.providers);
-    runRegister({"remove"});
-    const Registrations after = registrations();
-    EXPECT_EQ(after.classes, before.classes);
-    EXPECT_EQ(after.providers, before.providers);
-    EXPECT_EQ(after.libraries, before.libraries);
-    EXPECT_EQ(after.staged, before.staged);
+    release.upgrade();
+    const std::vector<std::string> inFolder = {"register", "--provider-folder", folder};
+    manager_.runRegister(inFolder, release.prefix());
+    restart();
+    for (const std::string& name : servedClasses)
+        EXPECT_EQ(versionOf(name), SENSOR_PROFILE_VERSION) << name;
+    EXPECT_FALSE(fs::is_symlink(folder + "/libComputerSystemProvider.so"));
+    const std::string upgraded = registrations();
+    const std::string upgradedAnswers = answers();
+    EXPECT_EQ(conformingSensors(), sensorsIn("root/cimv2"));
+    // OpenPegasus finds its own library of the former name again.
+    if (!isSfcb()) {
+        EXPECT_EQ(count("PG_ComputerSystem"), 1U);
+    }
+
+    manager_.runRegister({"remove", "--provider-folder", folder}, release.prefix());
+    restart();
+    EXPECT_EQ(registrations(), before);
+    // OpenPegasus keeps the classes; in sfcb the namespace had none before.
+    EXPECT_EQ(classNames().empty(), isSfcb());
+
+    reset();
+    folderOfFormerLibraries();
+    manager_.runRegister(inFolder);
+    restart();
+    EXPECT_EQ(registrations(), upgraded);
+    EXPECT_EQ(answers(), upgradedAnswers);
 }
 
 TEST_P(RegistrationTest, WorksWithoutComputerSystem)
 {
-    runRegister({"register", "--without-computer-system"});
+    manager_.runRegister({"register", "--without-computer-system"});
+    restart();
     EXPECT_EQ(count("ZUMLO_NumericSensor"), 40U);
     EXPECT_EQ(count("ZUMLO_SensorElementCapabilities"), 40U);
     EXPECT_EQ(count("ZUMLO_SensorSystemDevice"), 0U);
@@ -216,13 +227,23 @@ TEST_P(RegistrationTest, WorksWithoutComputerSystem)
 
 TEST_P(RegistrationTest, StaysAsItWasWhenClassesDoNotCompile)
 {
-    const ChangedInstallation installation;
-    runRegister({"register"}, installation.prefix());
-    const Registrations before = registrations();
-    installation.damage();
-    EXPECT_THROW(runRegister({"register"}, installation.prefix()), std::runtime_error);
-    if (isSfcb())
-        start();
+    const TemporaryFolder folder;
+    const fs::path prefix = folder.path() / "installation";
+    fs::copy(movedInstallation(), prefix, fs::copy_options::recursive);
+    manager_.runRegister({"register"}, prefix);
+    const std::string before = registrations();
+    std::ofstream(prefix / "share/sensor-profile/sensor-profile.mof", std::ios::app) << "class {\n";
+    try {
+        manager_.runRegister({"register"}, prefix);
+        FAIL() << "The classes were compiled.";
+    } catch (const std::runtime_error& error) {
+        // OpenPegasus has compiled the first file, which is undone.
+        EXPECT_THAT(error.what(),
+            testing::HasSubstr(isSfcb() ? "Nothing was changed."
+                                        : " register --object-manager openpegasus --namespace "
+                                          "root/cimv2 --provider-folder"));
+    }
+    restart();
     EXPECT_EQ(count("ZUMLO_SensorSystemDevice"), 40U);
     EXPECT_EQ(registrations(), before);
 }
