@@ -4,8 +4,6 @@
 
 #pragma once
 
-#include "host/broker/LargeBlocks.h"
-
 #include <cstddef>
 #include <memory>
 #include <memory_resource>
@@ -21,7 +19,11 @@ class String;
 // Used by one thread at a time and without locks.
 class Arena {
 public:
-    Arena() = default;
+    // The resource, which must outlive the arena, has the blocks of its memory.
+    explicit Arena(std::pmr::memory_resource& blocks = *std::pmr::get_default_resource())
+        : memory_(firstBlock, &blocks)
+    {
+    }
     Arena(const Arena&) = delete;
     Arena& operator=(const Arena&) = delete;
 
@@ -71,8 +73,7 @@ private:
 
     Name& findName(std::string_view characters);
 
-    LargeBlocks blocks_;
-    std::pmr::monotonic_buffer_resource memory_{firstBlock, &blocks_};
+    std::pmr::monotonic_buffer_resource memory_;
     std::pmr::unordered_map<std::string_view, Name> names_{&memory_};
     Name* lastName_ = nullptr;
 };
