@@ -2,6 +2,8 @@
 
 #include "platform/instrumentation/RegularFile.h"
 
+#include "platform/instrumentation/Descriptor.h"
+
 #include <algorithm>
 #include <array>
 #include <cerrno>
@@ -20,24 +22,6 @@ namespace {
 {
     throw std::runtime_error(std::generic_category().message(errno));
 }
-
-class Descriptor {
-public:
-    explicit Descriptor(const std::string& path)
-        : number_(open(path.c_str(), O_RDONLY | O_CLOEXEC | O_NOCTTY | O_NONBLOCK))
-    {
-        if (number_ < 0)
-            failWithErrno();
-    }
-    ~Descriptor() { close(number_); }
-    Descriptor(const Descriptor&) = delete;
-    Descriptor& operator=(const Descriptor&) = delete;
-
-    int number() const { return number_; }
-
-private:
-    int number_;
-};
 
 FileStamp stampOfRegular(const struct stat& status)
 {
@@ -86,7 +70,9 @@ FileStamp stampOfRegularFile(const std::string& path)
 FileContent readRegularFile(const std::string& path, std::size_t limit)
 {
     stampOfRegularFile(path); // opening a device can have side effects
-    const Descriptor file(path);
+    const Descriptor file(open(path.c_str(), O_RDONLY | O_CLOEXEC | O_NOCTTY | O_NONBLOCK));
+    if (!file.isOpen())
+        failWithErrno();
     struct stat status {};
     if (fstat(file.number(), &status) != 0)
         failWithErrno();
