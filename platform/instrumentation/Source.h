@@ -48,8 +48,8 @@ public:
     // Throws std::runtime_error naming the file, line or chip when it cannot be used.
     virtual std::vector<Node> nodes(NodeLexicon::NodeType type) = 0;
 
-    // Reads a node that nodes() of this object returned. A value that cannot be read now is absent,
-    // never an earlier one.
+    // Reads a node that the last call of nodes() returned. A value that cannot be read now is
+    // absent, never an earlier one.
     virtual NodeReading read(const Node& node) = 0;
 };
 

@@ -2,14 +2,15 @@
 
 #pragma once
 
-#include "platform/instrumentation/hwmon/Chip.h"
+#include "platform/instrumentation/hwmon/Catalogue.h"
 #include "platform/instrumentation/hwmon/Status.h"
 
 namespace Vorn::Hwmon {
 
-// Reads a fan, voltage or temperature feature from the kernel, with the administrator's `compute`
-// lines applied and without unset limits. REQUIRES: a ChipList lock is held; the feature exists.
-Channel readChannel(const Feature& feature);
+// Reads each attribute of a feature once, with the administrator's `compute` lines applied and
+// without unset limits. `folder` is a descriptor of the chip's folder; without one no attribute
+// that the kernel's number is taken of can be read.
+Channel readChannel(const Chip& chip, int folder, const Feature& feature);
 
 // Returns volts whose millivolts, truncated, are the whole number that the hardware reported. Of
 // some numbers the nearest double lies below: 1200 mV divided by 1000 would be truncated to 1199.

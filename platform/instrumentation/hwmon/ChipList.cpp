@@ -3,7 +3,6 @@
 #include "platform/instrumentation/hwmon/ChipList.h"
 
 #include "platform/instrumentation/Report.h"
-#include "platform/instrumentation/hwmon/Machine.h"
 
 #include <sensors/error.h>
 #include <sensors/sensors.h>
@@ -18,6 +17,12 @@
 
 namespace Vorn::Hwmon {
 
+namespace {
+
+constexpr auto attributesPeriod = std::chrono::seconds(2);
+
+} // namespace
+
 ChipList& ChipList::instance()
 {
     static ChipList list;
@@ -30,29 +35,63 @@ ChipList::~ChipList()
     sensors_cleanup();
 }
 
-ChipList::Lock ChipList::lockKnown()
-{
-    return Lock(mutex_);
-}
-
-ChipList::Lock ChipList::lockPresent()
+std::shared_ptr<const Catalogue> ChipList::present()
 {
     for (;;) {
-        const std::string present = machineFingerprint();
-        Lock shared(mutex_);
-        if (fingerprint_ == present)
-            return shared;
-        shared.unlock();
-        {
-            const std::unique_lock alone(mutex_);
-            if (fingerprint_ != present)
-                renew();
-        }
-        shared.lock();
-        // The fingerprint is empty when a renewal by another thread failed meanwhile.
-        if (!fingerprint_.empty())
-            return shared;
+        auto listed = known();
+        if (listed != nullptr && isPresent(*listed))
+            return listed;
+        const std::unique_lock alone(mutex_);
+        if (catalogue_ != listed) // another thread has renewed the list meanwhile
+            continue;
+        renew();
+        return catalogue_;
     }
+}
+
+std::optional<double> ChipList::computedValue(
+    const Chip& chip, const Feature& feature, const Attribute& attribute)
+{
+    const std::shared_lock shared(mutex_);
+    int chipPosition = 0;
+    while (const auto* const name = sensors_get_detected_chips(nullptr, &chipPosition)) {
+        if (chip.path != name->path)
+            continue;
+        int featurePosition = 0;
+        while (const auto* const found = sensors_get_features(name, &featurePosition)) {
+            if (feature.name != found->name)
+                continue;
+            const auto* const subfeature =
+                sensors_get_subfeature(name, found, attribute.meaning->type);
+            double value = 0.0;
+            const bool isRead =
+                subfeature != nullptr && sensors_get_value(name, subfeature->number, &value) == 0;
+            // Another chip may have been registered at this path meanwhile.
+            return isRead && folderId(chip.path) == chip.id ? std::optional(value) : std::nullopt;
+        }
+    }
+    return std::nullopt;
+}
+
+std::shared_ptr<const Catalogue> ChipList::known()
+{
+    const std::shared_lock shared(mutex_);
+    return catalogue_;
+}
+
+// Lists the attributes of all chips every two seconds only, since that takes as long as a tenth of
+// their readings.
+bool ChipList::isPresent(const Catalogue& catalogue)
+{
+    if (catalogue.machine != presentMachine())
+        return false;
+    const auto now = Clock::now();
+    if (now - attributesListed_.load() < attributesPeriod)
+        return true;
+    if (catalogue.attributes != attributesFingerprint(catalogue.machine))
+        return false;
+    attributesListed_ = now;
+    return true;
 }
 
 // REQUIRES: this thread holds the exclusive lock.
@@ -61,15 +100,20 @@ void ChipList::renew()
     // libsensors fails when a chip disappears while it lists them; the next attempt may succeed.
     constexpr int maximumAttempts = 5;
     for (int attempt = 1; true; ++attempt) {
-        fingerprint_.clear();
+        catalogue_.reset();
         sensors_cleanup();
-        // The fingerprint is taken first: a chip that appears while libsensors lists the others
-        // changes it, and the next call lists them again.
-        const std::string present = machineFingerprint();
+        // The machine is taken first: a chip or attribute that appears while libsensors lists the
+        // others makes a difference to it, and a later call lists them again.
+        const auto now = Clock::now();
+        Machine machine = presentMachine();
+        const std::size_t attributes = attributesFingerprint(machine);
         try {
-            if (hasHwmon())
-                initialise(SensorsConfiguration());
-            fingerprint_ = present;
+            Catalogue catalogue =
+                machine.hasHwmon ? makeCatalogue(initialise(SensorsConfiguration())) : Catalogue();
+            catalogue.machine = std::move(machine);
+            catalogue.attributes = attributes;
+            catalogue_ = std::make_shared<const Catalogue>(std::move(catalogue));
+            attributesListed_ = now;
             return;
         } catch (const std::runtime_error&) {
             if (attempt == maximumAttempts)
@@ -78,7 +122,8 @@ void ChipList::renew()
     }
 }
 
-void ChipList::initialise(const SensorsConfiguration& configuration)
+// Makes libsensors list the chips, with the configuration applied to them.
+ComputeLines ChipList::initialise(const SensorsConfiguration& configuration)
 {
     std::string text = configuration.text();
     const std::unique_ptr<FILE, decltype(&fclose)> file(
@@ -91,6 +136,7 @@ void ChipList::initialise(const SensorsConfiguration& configuration)
     if (result != 0)
         throw std::runtime_error(
             std::string("libsensors cannot list the chips: ") + sensors_strerror(result));
+    return ComputeLines(text, !errors.list().empty());
 }
 
 // Reports the errors that the previous call did not have: each new list of chips comes with a new

@@ -4,51 +4,62 @@
 
 #pragma once
 
+#include "platform/instrumentation/hwmon/Catalogue.h"
+#include "platform/instrumentation/hwmon/ComputeLines.h"
 #include "platform/instrumentation/hwmon/LibsensorsHooks.h"
 #include "platform/instrumentation/hwmon/SensorsConfiguration.h"
 
+#include <atomic>
+#include <chrono>
+#include <memory>
+#include <optional>
 #include <shared_mutex>
 #include <string>
 #include <vector>
 
 namespace Vorn::Hwmon {
 
-// libsensors keeps one list, which all sources of the process share. Any number of threads may read
-// it, but renewing it excludes all others: a caller of libsensors holds a lock of this class for
-// the duration of the call, and no longer, so that a thread with two cursors cannot block itself.
+// libsensors keeps one list, which all sources of the process share. Its catalogue is made when the
+// list is renewed, so that requests need libsensors only for values that it computes. Thread-safe.
 //
 // While libsensors reads its configuration it sets the process's locale to "C" and back, which its
 // interface cannot prevent. This happens at the first request and when the machine or the
 // configuration has changed. Another user of libsensors in the process has a list of its own.
 class ChipList {
 public:
-    using Lock = std::shared_lock<std::shared_mutex>;
-
     // Returns the list of this process. libsensors is released when the library is unloaded.
     static ChipList& instance();
 
-    // Renews the list if the machine has changed, and locks it. Throws std::runtime_error with
-    // libsensors' reason.
-    Lock lockPresent();
+    // Returns the catalogue of the chips that are present now; where a driver adds an attribute to
+    // a chip that stays, it has it two seconds later. Throws std::runtime_error with libsensors'
+    // reason.
+    std::shared_ptr<const Catalogue> present();
 
-    // Locks the list without renewing it.
-    Lock lockKnown();
+    // Returns the value with the `compute` line applied that libsensors has for it; nothing when it
+    // cannot be read.
+    std::optional<double> computedValue(
+        const Chip& chip, const Feature& feature, const Attribute& attribute);
 
     ~ChipList();
     ChipList(const ChipList&) = delete;
     ChipList& operator=(const ChipList&) = delete;
 
 private:
+    using Clock = std::chrono::steady_clock;
+
     ChipList() = default;
 
+    std::shared_ptr<const Catalogue> known();
+    bool isPresent(const Catalogue& catalogue);
     void renew();
-    void initialise(const SensorsConfiguration& configuration);
+    ComputeLines initialise(const SensorsConfiguration& configuration);
     void reportOnce(const std::vector<LibsensorsHooks::ParseError>& errors,
         const SensorsConfiguration& configuration);
 
-    std::shared_mutex mutex_;
+    std::shared_mutex mutex_; // shared by readers of libsensors' list, exclusive for its renewal
     LibsensorsHooks hooks_;
-    std::string fingerprint_;           // of the machine when it was listed; empty before
+    std::shared_ptr<const Catalogue> catalogue_; // of libsensors' list; null where there is none
+    std::atomic<Clock::time_point> attributesListed_{};
     std::vector<std::string> reported_; // errors in the configuration
 };
 

@@ -3,14 +3,8 @@
 #include "platform/instrumentation/hwmon/HwmonSource.h"
 
 #include "platform/instrumentation/hwmon/ChannelReader.h"
-#include "platform/instrumentation/hwmon/Chip.h"
 #include "platform/instrumentation/hwmon/ChipList.h"
 #include "platform/instrumentation/hwmon/Status.h"
-#include "platform/text/Trim.h"
-#include "platform/text/Utf8.h"
-
-#include <algorithm>
-#include <iterator>
 
 namespace Vorn {
 
@@ -18,82 +12,41 @@ using NodeLexicon::NodeType;
 
 namespace {
 
-sensors_feature_type featureTypeOf(NodeType type)
-{
-    switch (type) {
-    case NodeType::Tachometer:
-        return SENSORS_FEATURE_FAN;
-    case NodeType::Voltage:
-        return SENSORS_FEATURE_IN;
-    case NodeType::Temperature:
-        return SENSORS_FEATURE_TEMP;
-    }
-    return SENSORS_FEATURE_UNKNOWN;
-}
-
-// The kernel's units are milli-units of these, which libsensors scales; the codes are those of
-// the DMTF value map CIM_NumericSensor.BaseUnits.
-unsigned baseUnitsOf(sensors_feature_type type)
+// Returns the code of the unit in the DMTF value map CIM_NumericSensor.BaseUnits.
+unsigned baseUnitsOf(NodeType type)
 {
     constexpr unsigned degreesC = 2;
     constexpr unsigned volts = 5;
     constexpr unsigned revolutionsPerMinute = 19;
-    if (type == SENSORS_FEATURE_FAN)
+    if (type == NodeType::Tachometer)
         return revolutionsPerMinute;
-    return type == SENSORS_FEATURE_IN ? volts : degreesC;
-}
-
-std::string descriptionOf(const Hwmon::Feature& feature)
-{
-    const std::string label = Text::toValidUtf8(Text::trimmed(Hwmon::labelOf(feature)));
-    return label.empty() ? feature.feature->name : label;
+    return type == NodeType::Voltage ? volts : degreesC;
 }
 
 } // namespace
 
-HwmonSource::HwmonSource() = default;
-
-HwmonSource::~HwmonSource() = default;
-
 std::vector<Node> HwmonSource::nodes(NodeType type)
 {
-    const auto lock = Hwmon::ChipList::instance().lockPresent();
+    chip_ = nullptr;
+    catalogue_ = Hwmon::ChipList::instance().present();
     std::vector<Node> nodes;
-    for (const sensors_chip_name* chip : Hwmon::detectedChips()) {
-        const auto folder = Hwmon::folderOf(*chip);
-        std::vector<Node> found = nodesOf(*chip, type);
-        // A chip that disappeared while its features were listed is left out, since the labels,
-        // which name the sensors, may be incomplete.
-        if (folder && folder == Hwmon::folderOf(*chip))
-            std::move(found.begin(), found.end(), std::back_inserter(nodes));
-    }
-    return nodes;
-}
-
-std::vector<Node> HwmonSource::nodesOf(const sensors_chip_name& chip, NodeType type)
-{
-    const std::string folder = "/hwmon/" + Hwmon::printedName(chip) + "/";
-    std::vector<Node> nodes;
-    for (const sensors_feature* entry : Hwmon::featuresOf(chip, featureTypeOf(type))) {
-        const Hwmon::Feature feature{&chip, entry};
-        nodes.push_back({folder + entry->name, descriptionOf(feature), static_cast<unsigned>(type),
-            listed_.size()});
-        listed_.push_back(Hwmon::identify(feature));
-    }
+    for (const Hwmon::Feature& feature : catalogue_->features)
+        if (feature.type == type)
+            nodes.push_back(feature.node);
     return nodes;
 }
 
 NodeReading HwmonSource::read(const Node& node)
 {
     constexpr unsigned lostCommunication = 13;
-    const auto lock = Hwmon::ChipList::instance().lockKnown();
-    const Hwmon::Feature feature = Hwmon::find(listed_.at(node.token));
+    const Hwmon::Feature& feature = catalogue_->features.at(node.token);
+    const Hwmon::Chip& chip = catalogue_->chips[feature.chip];
+    const Hwmon::Channel channel = Hwmon::readChannel(chip, folderOf(chip), feature);
     NodeReading values;
-    if (feature.feature == nullptr) {
+    if (!channel.reading && Hwmon::folderId(chip.path) != chip.id) {
         values.status = lostCommunication;
         return values;
     }
-    const Hwmon::Channel channel = Hwmon::readChannel(feature);
     values.status = Hwmon::statusOf(channel);
     // The reading of a channel with a fault, such as an open diode, is not to be trusted (the
     // kernel's sysfs-interface).
@@ -104,9 +57,22 @@ NodeReading HwmonSource::read(const Node& node)
     values.lowerCritical = channel.limits.lcrit;
     values.upperCritical = channel.limits.crit;
     values.upperFatal = channel.limits.emergency;
-    values.baseUnits = baseUnitsOf(feature.feature->type);
+    values.baseUnits = baseUnitsOf(feature.type);
     values.possibleStates = Hwmon::possibleStatesOf(channel);
     return values;
+}
+
+// Returns a descriptor of the chip's folder, which stays open until the folder of another chip is
+// requested.
+int HwmonSource::folderOf(const Hwmon::Chip& chip)
+{
+    if (chip.folder.isOpen())
+        return chip.folder.number();
+    if (chip_ != &chip) {
+        folder_ = chip.openFolder();
+        chip_ = &chip;
+    }
+    return folder_.number();
 }
 
 } // namespace Vorn

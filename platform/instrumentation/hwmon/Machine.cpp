@@ -2,98 +2,77 @@
 
 #include "platform/instrumentation/hwmon/Machine.h"
 
-#include "platform/instrumentation/FileStamp.h"
 #include "platform/instrumentation/hwmon/SensorsConfiguration.h"
 
-#include <algorithm>
-#include <filesystem>
-#include <fstream>
+#include <dirent.h>
+#include <fcntl.h>
+#include <sys/stat.h>
+
 #include <functional>
-#include <system_error>
-#include <vector>
+#include <memory>
+#include <string_view>
 
 namespace Vorn::Hwmon {
-
-namespace fs = std::filesystem;
 
 namespace {
 
 constexpr const char* hwmonFolder = "/sys/class/hwmon";
 
-std::vector<fs::path> entriesOf(const fs::path& folder)
+// Calls the visitor with a descriptor of the folder and the name of each entry that is not hidden.
+// Returns whether there is such a folder.
+template <typename Visitor>
+bool visitEntries(const std::string& path, const Visitor& visit)
 {
-    std::vector<fs::path> entries;
-    std::error_code error;
-    for (fs::directory_iterator entry(folder, error), end; !error && entry != end;
-         entry.increment(error))
-        entries.push_back(entry->path());
-    return entries;
+    const std::unique_ptr<DIR, int (*)(DIR*)> folder(opendir(path.c_str()), &closedir);
+    if (folder == nullptr)
+        return false;
+    while (const dirent* const entry = readdir(folder.get()))
+        if (entry->d_name[0] != '.')
+            visit(dirfd(folder.get()), entry->d_name);
+    return true;
 }
 
-std::string firstLine(const fs::path& path)
-{
-    std::ifstream file(path);
-    std::string line;
-    std::getline(file, line);
-    return line;
-}
-
-// Drivers may add and remove attributes of a registered chip.
-std::size_t attributesFingerprint(const fs::path& folder)
-{
-    std::size_t sum = 0;
-    for (const fs::path& attribute : entriesOf(folder))
-        sum += std::hash<std::string>{}(attribute.filename().native());
-    return sum;
-}
-
-// A chip that is registered anew gets another inode. The times of a folder in sysfs are no
-// criterion: the kernel sets them whenever it allocates the inode, which it may evict from its
-// cache.
-std::string chipFingerprint(const fs::path& folder)
+// Relative paths begin at the folder.
+std::optional<FolderId> folderIdAt(int folder, const char* path)
 {
     struct stat status {};
-    if (stat(folder.c_str(), &status) != 0)
-        return folder.string() + " gone\n";
-    std::error_code noDevice;
-    return folder.string() + ' ' + std::to_string(status.st_dev) + ' ' +
-           std::to_string(status.st_ino) + ' ' + firstLine(folder / "name") + ' ' +
-           fs::read_symlink(folder / "device", noDevice).string() + ' ' +
-           std::to_string(attributesFingerprint(folder)) + '\n';
-}
-
-std::string fileFingerprint(const fs::path& path)
-{
-    struct stat status {};
-    if (stat(path.c_str(), &status) != 0)
-        return {};
-    const FileStamp stamp = stampOf(status);
-    std::string fingerprint = path.string();
-    for (const auto number : {stamp.size, stamp.modified.seconds, stamp.modified.nanoseconds,
-             stamp.changed.seconds, stamp.changed.nanoseconds})
-        fingerprint += ' ' + std::to_string(number);
-    return fingerprint + ' ' + std::to_string(stamp.device) + ' ' + std::to_string(stamp.inode) +
-           '\n';
+    if (fstatat(folder, path, &status, 0) != 0)
+        return std::nullopt;
+    return FolderId{status.st_dev, status.st_ino};
 }
 
 } // namespace
 
-bool hasHwmon()
+std::optional<FolderId> folderId(const std::string& path)
 {
-    std::error_code ignored;
-    return fs::is_directory(hwmonFolder, ignored);
+    return folderIdAt(AT_FDCWD, path.c_str());
 }
 
-std::string machineFingerprint()
+Machine presentMachine()
 {
-    std::vector<fs::path> chips = entriesOf(hwmonFolder);
-    std::sort(chips.begin(), chips.end());
-    std::string fingerprint = "machine\n";
-    for (const fs::path& chip : chips)
-        fingerprint += chipFingerprint(chip);
-    for (const fs::path& file : configurationFiles())
-        fingerprint += fileFingerprint(file);
-    return fingerprint;
+    Machine machine;
+    machine.hasHwmon = visitEntries(hwmonFolder, [&](int folder, const char* name) {
+        if (const auto id = folderIdAt(folder, name))
+            machine.chips.emplace_back(name, *id);
+    });
+    for (const auto& file : configurationFiles()) {
+        struct stat status {};
+        if (stat(file.c_str(), &status) == 0)
+            machine.files.emplace_back(file.native(), stampOf(status));
+    }
+    return machine;
+}
+
+std::size_t attributesFingerprint(const Machine& machine)
+{
+    std::size_t sum = 0;
+    for (const auto& [chip, id] : machine.chips) {
+        std::size_t names = 0;
+        visitEntries(std::string(hwmonFolder) + "/" + chip,
+            [&](int, std::string_view name) { names += std::hash<std::string_view>{}(name); });
+        sum = sum * 31 + names;
+    }
+    return sum;
 }
 
 } // namespace Vorn::Hwmon

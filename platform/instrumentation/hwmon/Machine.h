@@ -4,16 +4,40 @@
 
 #pragma once
 
+#include "platform/instrumentation/FileStamp.h"
+
+#include <cstddef>
+#include <optional>
 #include <string>
+#include <utility>
+#include <vector>
+
+#include <sys/types.h>
 
 namespace Vorn::Hwmon {
 
-// Returns whether the kernel has a hwmon class. Where it has none there are no sensors, and
-// libsensors would report an error of the kernel's interface.
-bool hasHwmon();
+// Identifies a chip's folder in sysfs: a chip that is registered anew gets another one. The times
+// of the folder are no criterion: the kernel sets them whenever it allocates the inode, which it
+// may evict from its cache.
+using FolderId = std::pair<dev_t, ino_t>;
 
-// Returns a text that changes with the set of chips and with the configuration; never empty.
-// Costs a few system calls per chip.
-std::string machineFingerprint();
+// Returns nothing when there is no such folder.
+std::optional<FolderId> folderId(const std::string& path);
+
+// What the list of chips depends on.
+struct Machine {
+    bool hasHwmon = false;                                // whether the kernel has a hwmon class
+    std::vector<std::pair<std::string, FolderId>> chips;  // with the names of their folders
+    std::vector<std::pair<std::string, FileStamp>> files; // of the sensors configuration
+
+    bool operator==(const Machine&) const = default;
+};
+
+// Costs a few system calls, and one for each chip.
+Machine presentMachine();
+
+// Returns a number that changes with the names of the attributes of the chips: drivers may add and
+// remove attributes of a registered chip. Lists the folder of each chip.
+std::size_t attributesFingerprint(const Machine& machine);
 
 } // namespace Vorn::Hwmon

@@ -86,7 +86,9 @@ std::vector<unsigned> possibleStatesOf(const Channel& channel)
 {
     const Limits& limits = channel.limits;
     const Alarms& alarms = channel.alarms;
-    std::vector<unsigned> states{normal};
+    std::vector<unsigned> states;
+    states.reserve(7);
+    states.push_back(normal);
     const auto addIf = [&](bool canHappen, unsigned state) {
         if (canHappen)
             states.push_back(state);

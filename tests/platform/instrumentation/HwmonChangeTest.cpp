@@ -53,16 +53,23 @@ TEST_F(HwmonChangeTest, AChipThatTookAnothersPlaceIsTakenForWhatItIs)
 {
     BoundSysfs sysfs("hotplug");
     walk();
-    sysfs.write(std::string(nvme) + "/name", "other\n");
-    EXPECT_THAT(paths(), testing::Contains("/hwmon/other-pci-0200/temp1"));
+    sysfs.rename(nvme, "unplugged");
+    sysfs.addChip("hwmon1", "other", "pci", "0000:03:00.0");
+    sysfs.write(std::string(nvme) + "/temp1_input", "20000\n");
+    EXPECT_THAT(paths(), testing::Contains("/hwmon/other-pci-0300/temp1"));
 }
 
-TEST_F(HwmonChangeTest, AnAttributeThatADriverAddsShowsAtTheNextRequest)
+TEST_F(HwmonChangeTest, AnAttributeThatADriverAddsShowsWithinTwoSeconds)
 {
     OneChip chip(Attributes{{"temp1_input", "20000"}});
     EXPECT_THAT(walk(), SizeIs(1));
     chip.set("temp2_input", "21000");
-    EXPECT_THAT(walk(), SizeIs(2));
+    chip.set("temp1_max", "30000");
+    std::this_thread::sleep_for(std::chrono::seconds(2));
+    const auto nodes = walk();
+    ASSERT_THAT(nodes, SizeIs(2));
+    EXPECT_EQ(nodes[0].values.upperNonCritical, 30.0);
+    EXPECT_EQ(nodes[1].values.reading, 21.0);
 }
 
 TEST_F(HwmonChangeTest, AListedNodeWhoseChipVanishedIsLost)
