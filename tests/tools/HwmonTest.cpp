@@ -3,6 +3,7 @@
 // The output of the tool on captured machines, compared with that of `sensors -j`.
 
 #include "tests/support/MountNamespace.h"
+#include "tests/support/SensorsProgram.h"
 #include "tests/tools/ToolTest.h"
 
 #include <gmock/gmock.h>
@@ -16,55 +17,6 @@ namespace {
 
 using nlohmann::json;
 using namespace Testing;
-
-// One channel in the output of `sensors -j`: subfeatures by the part of their name after "temp1_".
-struct Channel {
-    std::string label;
-    std::map<std::string, double> values;
-
-    bool isSet(const std::string& subfeature) const
-    {
-        const auto found = values.find(subfeature);
-        return found != values.end() && found->second != 0;
-    }
-};
-
-// Returns a channel without the values that the product leaves out: the reading of a faulty
-// channel, and pairs of limits that are both 0.
-Channel channelOf(const std::string& label, const json& subfeatures)
-{
-    Channel channel{label, {}};
-    for (const auto& [name, value] : subfeatures.items())
-        channel.values[name.substr(name.find('_') + 1)] = value.get<double>();
-    if (channel.isSet("fault"))
-        channel.values.erase("input");
-    for (const auto& [lower, upper] : {std::pair("min", "max"), {"lcrit", "crit"}})
-        if (!channel.isSet(lower) && !channel.isSet(upper)) {
-            channel.values.erase(lower);
-            channel.values.erase(upper);
-        }
-    return channel;
-}
-
-// Returns the channels of temperatures, voltages and fans by the path of their node.
-std::map<std::string, Channel> channels()
-{
-    const Ended ended = run({"-j"}, {.program = "/usr/bin/sensors"});
-    EXPECT_EQ(ended.code, 0) << ended.err;
-    std::map<std::string, Channel> found;
-    const json document = json::parse(ended.out);
-    for (const auto& [chip, features] : document.items())
-        for (const auto& [label, subfeatures] : features.items()) {
-            if (label == "Adapter" || subfeatures.empty())
-                continue;
-            const std::string name = subfeatures.begin().key();
-            const std::string kind = name.substr(0, name.find_first_of("0123456789"));
-            if (kind == "temp" || kind == "in" || kind == "fan")
-                found["/hwmon/" + chip + "/" + name.substr(0, name.find('_'))] =
-                    channelOf(label, subfeatures);
-        }
-    return found;
-}
 
 std::map<std::string, json> recordedNodes()
 {
@@ -103,7 +55,7 @@ constexpr Value values[] = {{"input", "reading", "CurrentReading"},
 // line applies, the number printed was rounded to thousandths, and the truncation may give one unit
 // less.
 void expectSame(
-    const json& node, const json& properties, const Channel& channel, bool mayBeComputed)
+    const json& node, const json& properties, const SensorsChannel& channel, bool mayBeComputed)
 {
     constexpr double printedDigits = 0.0005;
     const int scale = properties.at("UnitModifier") == 0 ? 1 : 1000;
@@ -152,7 +104,7 @@ private:
 
 TEST_P(HwmonTest, ShowsWhatTheSensorsProgramReads)
 {
-    const auto theirs = channels();
+    const auto theirs = sensorsChannels();
     const auto nodes = recordedNodes();
     const auto instances = listedSensors();
     EXPECT_GT(theirs.size(), 2U);
@@ -177,7 +129,8 @@ TEST_P(HwmonTest, RecordReplaysToTheSameOutput)
 }
 
 INSTANTIATE_TEST_SUITE_P(Machines, HwmonTest,
-    testing::Combine(testing::Values("desktop", "server", "hotplug"), testing::Bool()),
+    testing::Combine(testing::Values("desktop", "server", "hotplug", "twosocket", "laptop", "arm"),
+        testing::Bool()),
     [](const auto& machine) {
         return std::get<0>(machine.param) +
                std::string(std::get<1>(machine.param) ? "Configured" : "");

@@ -98,14 +98,32 @@ TEST_F(HwmonChangeTest, AListedNodeOutlivesChangesElsewhere)
     EXPECT_EQ(source.read(nodes.at(2)).reading, 35.85);
 }
 
-TEST_F(HwmonChangeTest, NodesOfEarlierListingsCanBeRead)
+TEST_F(HwmonChangeTest, AComputedNodeOutlivesChangesElsewhere)
 {
-    const BoundSysfs sysfs("server");
+    configuration().write("chip \"nvme-*\"\n  compute temp1 @*2, @/2\n");
+    BoundSysfs sysfs("hotplug");
     Vorn::HwmonSource source;
-    const auto temperatures = source.nodes(NodeType::Temperature);
-    const auto fans = source.nodes(NodeType::Tachometer);
-    EXPECT_EQ(source.read(temperatures.at(0)).baseUnits, 2U);
-    EXPECT_EQ(source.read(fans.at(0)).baseUnits, 19U);
+    const auto nodes = source.nodes(NodeType::Temperature);
+    sysfs.remove("hwmon/hwmon0");
+    walk();
+    EXPECT_EQ(source.read(nodes.at(2)).reading, 71.7);
+    configuration().write("");
+    walk();
+    EXPECT_EQ(source.read(nodes.at(2)).reading, 35.85) << "the configuration is that of now";
+}
+
+TEST_F(HwmonChangeTest, AComputedNodeIsNotReadFromAChipThatTookItsPlace)
+{
+    configuration().write("chip \"*-*\"\n  compute temp1 @*2, @/2\n");
+    BoundSysfs sysfs("hotplug");
+    Vorn::HwmonSource source;
+    const auto nodes = source.nodes(NodeType::Temperature);
+    sysfs.rename(nvme, "unplugged");
+    sysfs.addChip("hwmon1", "other", "pci", "0000:03:00.0");
+    sysfs.write(std::string(nvme) + "/temp1_input", "20000\n");
+    EXPECT_EQ(source.read(nodes.at(2)), Vorn::NodeReading{.status = 13});
+    walk();
+    EXPECT_EQ(source.read(nodes.at(2)), Vorn::NodeReading{.status = 13});
 }
 
 TEST_F(HwmonChangeTest, AChangedConfigurationHoldsAtTheNextRequest)
@@ -134,7 +152,7 @@ TEST_F(HwmonChangeTest, TwoCursorsOnOneThreadDoNotBlockEachOther)
 std::optional<double> expectedReading(const Testing::SeenNode& node)
 {
     static const std::map<std::string, double> readings{{"/hwmon/coretemp-isa-0000/temp1", 44.0},
-        {"/hwmon/drivetemp-scsi-2-0/temp1", 31.0}, {"/hwmon/nvme-pci-0200/temp1", 35.85}};
+        {"/hwmon/drivetemp-scsi-2-0/temp1", 62.0}, {"/hwmon/nvme-pci-0200/temp1", 35.85}};
     if (node.values.status == 13)
         return std::nullopt;
     return readings.at(node.path);
@@ -142,6 +160,7 @@ std::optional<double> expectedReading(const Testing::SeenNode& node)
 
 TEST_F(HwmonChangeTest, EightThreadsReadWhileChipsComeAndGo)
 {
+    configuration().write("chip \"drivetemp-*\"\n  compute temp1 @*2, @/2\n");
     BoundSysfs sysfs("hotplug");
     std::atomic<bool> goOn{true};
     std::atomic<unsigned> walks{0};

@@ -1,0 +1,91 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// The descriptors of the chips' folders.
+
+#include "platform/instrumentation/hwmon/HwmonSource.h"
+#include "tests/platform/instrumentation/HwmonMachine.h"
+
+#include <gtest/gtest.h>
+
+#include <iterator>
+
+namespace HwmonFoldersTests {
+
+using Testing::BoundSysfs;
+using Vorn::NodeLexicon::NodeType;
+
+using HwmonFoldersTest = Testing::HwmonTest;
+
+// The descriptor that lists the folder is one of them, in every call.
+std::ptrdiff_t openDescriptors()
+{
+    const std::filesystem::directory_iterator entries("/proc/self/fd");
+    return std::distance(begin(entries), end(entries));
+}
+
+void plugIn(BoundSysfs& sysfs, int chip)
+{
+    const std::string name = "hwmon" + std::to_string(chip);
+    sysfs.addChip(name, "board", "platform", "board." + std::to_string(chip));
+    sysfs.write("hwmon/" + name + "/temp1_input", std::to_string(chip * 1000) + "\n");
+    sysfs.write("hwmon/" + name + "/temp2_input", std::to_string(chip * 1000 + 500) + "\n");
+}
+
+TEST_F(HwmonFoldersTest, AnOpenDescriptorStaysForEachChip)
+{
+    BoundSysfs sysfs("");
+    Testing::walk();
+    const auto before = openDescriptors();
+    plugIn(sysfs, 1);
+    plugIn(sysfs, 2);
+    for (int request = 0; request < 3; ++request) {
+        Testing::walk();
+        EXPECT_EQ(openDescriptors(), before + 2);
+    }
+    sysfs.remove("hwmon/hwmon1");
+    Testing::walk();
+    EXPECT_EQ(openDescriptors(), before + 1);
+}
+
+TEST_F(HwmonFoldersTest, PastTheBoundFoldersAreOpenWhileTheyAreRead)
+{
+    constexpr int chips = 260;
+    BoundSysfs sysfs("");
+    Testing::walk();
+    const auto before = openDescriptors();
+    for (int chip = 0; chip < chips; ++chip)
+        plugIn(sysfs, chip);
+    EXPECT_EQ(Testing::walk().size(), 2U * chips);
+    EXPECT_EQ(openDescriptors(), before + 256);
+
+    Vorn::HwmonSource source;
+    double sum = 0.0;
+    for (const Vorn::Node& node : source.nodes(NodeType::Temperature)) {
+        sum += source.read(node).reading.value();
+        EXPECT_LE(openDescriptors(), before + 257);
+    }
+    EXPECT_EQ(sum, chips * (chips - 1) + 0.5 * chips);
+}
+
+TEST_F(HwmonFoldersTest, PastTheBoundAChipThatTookAnothersPlaceIsNotReadForIt)
+{
+    constexpr int chips = 257;
+    BoundSysfs sysfs("");
+    for (int chip = 0; chip < chips; ++chip)
+        plugIn(sysfs, chip);
+    Vorn::HwmonSource source;
+    const auto nodes = source.nodes(NodeType::Temperature);
+    ASSERT_EQ(nodes.size(), 2U * chips);
+    for (const std::string chip : {"hwmon0", "hwmon256"}) {
+        sysfs.rename("hwmon/" + chip, "unplugged-" + chip);
+        sysfs.addChip(chip, "other", "platform", "other." + chip);
+        sysfs.write("hwmon/" + chip + "/temp1_input", "99000\n");
+        sysfs.remove("unplugged-" + chip);
+    }
+    for (const std::size_t index : {std::size_t{0}, nodes.size() - 2}) {
+        EXPECT_EQ(source.read(nodes[index]), Vorn::NodeReading{.status = 13}) << nodes[index].path;
+        EXPECT_TRUE(source.read(nodes[index + 2 < nodes.size() ? index + 2 : 2]).reading);
+    }
+}
+
+} // namespace HwmonFoldersTests
