@@ -19,6 +19,16 @@ _sensorctl_takes() {
     grep --quiet --extended-regexp -e "^  ([^ ]+,)?$3(,[^ ]+)? $4\\b"
 }
 
+# Prints the chips and labels of the machine, that of a model file if the command line names one.
+_sensorctl_sensors() {
+  local tool=$1 model=() i
+  for ((i = 1; i < ${#COMP_WORDS[@]} - 1; i++)); do
+    [ "${COMP_WORDS[i]}" != --model ] || model=(--model "${COMP_WORDS[i + 1]}")
+  done
+  "$tool" list --json "${model[@]}" 2>/dev/null |
+    sed -n 's/.*"chip": "\([^"\\]*\)".*"label": "\([^"\\]*\)".*/\1\n\2/p' | sort --unique
+}
+
 _sensorctl() {
   local tool=$1 word=$2 previous=$3 command=${COMP_WORDS[1]}
   COMPREPLY=()
@@ -30,13 +40,19 @@ _sensorctl() {
     mapfile -t COMPREPLY < <(compgen -W "$(_sensorctl_options "$tool")" -- "$word")
   elif [[ $word == -* ]]; then
     mapfile -t COMPREPLY < <(compgen -W "$(_sensorctl_options "$tool" "$command")" -- "$word")
-  elif [ "$command" = list ] && [[ $previous != -* || $previous == --json ]]; then
+  elif [ "$previous" = --kind ]; then
+    mapfile -t COMPREPLY < <(compgen -W 'temperature voltage fan' -- "$word")
+  elif [ "$command" = list ] && [[ $word == ZUMLO_* ]]; then
     mapfile -t COMPREPLY < <(compgen -W "$("$tool" list --help 2>/dev/null |
       grep --only-matching -e 'ZUMLO_[A-Za-z]*') ZUMLO_NumericSensor" -- "$word")
   elif _sensorctl_takes "$tool" "$command" "$previous" FILE; then
     mapfile -t COMPREPLY < <(compgen -f -- "$word")
   elif [ "$previous" = --user ]; then
     mapfile -t COMPREPLY < <(compgen -u -- "$word")
+  elif ! _sensorctl_takes "$tool" "$command" "$previous" '[A-Z]+' &&
+    "$tool" "$command" --help 2>/dev/null | grep --quiet --extended-regexp -e '^  (SELECTOR|OBJECT) '; then
+    local IFS=$'\n'
+    mapfile -t COMPREPLY < <(compgen -W "$(_sensorctl_sensors "$tool")" -- "$word")
   fi
 }
 

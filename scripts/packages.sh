@@ -16,7 +16,7 @@ check_packages=(
   "${build_packages[@]}"
   clang clang-format clang-tidy libclang-rt-14-dev
   libbenchmark-dev libgmock-dev libgtest-dev
-  binutils lm-sensors locales util-linux
+  binutils lm-sensors locales python3-jsonschema util-linux
   openssl sblim-wbemcli
   debootstrap dpkg-dev file iproute2 lintian man-db mandoc rpm rpmlint shellcheck systemd valgrind
 )

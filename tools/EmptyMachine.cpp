@@ -30,6 +30,15 @@ Look lookAtMachine()
     return look;
 }
 
+// Returns the text as a word of the shell.
+std::string quoted(const std::string& text)
+{
+    std::string word = "'";
+    for (const char c : text)
+        word += c == '\'' ? "'\\''" : std::string(1, c);
+    return word + "'";
+}
+
 } // namespace
 
 std::size_t countSensors()
@@ -57,15 +66,20 @@ ExitCode complainOfEmptyMachine(const std::optional<std::string>& model)
     return ExitCode::nothingFound;
 }
 
-ExitCode complainOfNoObject(
-    const std::string& wanted, bool isMachineEmpty, const std::optional<std::string>& model)
+ExitCode complainOfNoObject(const ObjectFound& found, const std::string& command,
+    const std::optional<std::string>& model)
 {
-    if (isMachineEmpty) {
+    if (found.isMachineEmpty) {
         checkMachineIsEmpty();
         return complainOfEmptyMachine(model);
     }
-    complain("no object has the DeviceID, the name, the InstanceID or the path \"" + wanted + "\"");
-    return ExitCode::nothingFound;
+    const std::string start = "sensorctl " + command + (model ? " --model " + quoted(*model) : "");
+    std::vector<std::string> lines;
+    for (const Sensor& sensor : found.choices)
+        lines.push_back(start + (sensor.deviceId.starts_with('-') ? " -- " : " ") +
+                        quoted(sensor.deviceId));
+    complain(found.complaint, lines);
+    return lines.empty() ? ExitCode::nothingFound : ExitCode::failure;
 }
 
 } // namespace Tools

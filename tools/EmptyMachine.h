@@ -5,6 +5,7 @@
 #pragma once
 
 #include "tools/Command.h"
+#include "tools/ObjectSearch.h"
 
 #include <cstddef>
 #include <optional>
@@ -25,9 +26,9 @@ void checkMachineIsEmpty();
 // Writes to standard error that the machine, or the model file, has no sensors.
 ExitCode complainOfEmptyMachine(const std::optional<std::string>& model);
 
-// Writes to standard error that no object matches, or that the machine has no sensors. Calls
-// checkMachineIsEmpty() in the second case.
-ExitCode complainOfNoObject(
-    const std::string& wanted, bool isMachineEmpty, const std::optional<std::string>& model);
+// Writes to standard error why there is no object, with the command lines for sensors to choose
+// from. Calls checkMachineIsEmpty() where the machine has no sensors.
+ExitCode complainOfNoObject(const ObjectFound& found, const std::string& command,
+    const std::optional<std::string>& model);
 
 } // namespace Tools

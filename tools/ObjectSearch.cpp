@@ -4,31 +4,13 @@
 
 #include "host/broker/Instance.h"
 #include "tools/cim/ProviderClient.h"
-#include "tools/cim/SensorView.h"
+#include "tools/sensors/Selector.h"
 
 #include <algorithm>
-#include <stdexcept>
 
 namespace Tools {
 
 namespace {
-
-Instances named(const Instances& sensors, std::string_view name)
-{
-    Instances found;
-    for (const Host::Instance* const sensor : sensors)
-        if (SensorView(*sensor).name() == name)
-            found.push_back(sensor);
-    return found;
-}
-
-[[noreturn]] void refuseAmbiguous(const std::string& name, const Instances& sensors)
-{
-    std::string text = "several sensors are named \"" + name + "\"; give one of their DeviceIDs:";
-    for (const Host::Instance* const sensor : sensors)
-        text.append(" \"").append(SensorView(*sensor).deviceId()).append("\"");
-    throw std::runtime_error(text);
-}
 
 const Host::Instance* capabilities(ProviderClient& provider, std::string_view instanceId)
 {
@@ -42,19 +24,40 @@ const Host::Instance* capabilities(ProviderClient& provider, std::string_view in
 
 } // namespace
 
-ObjectFound findObject(ProviderClient& provider, const std::string& wanted)
+ObjectFound ObjectSearch::find(const std::string& wanted)
 {
-    if (const Host::ObjectPath* const path = provider.readPath(wanted))
-        return {.object = provider.instance(*path)};
-    if (const Host::Instance* const sensor = provider.sensor(wanted))
-        return {.object = sensor};
-    const Instances sensors = provider.sensors();
-    const Instances found = named(sensors, wanted);
-    if (found.size() > 1)
-        refuseAmbiguous(wanted, found);
-    if (!found.empty())
-        return {.object = found.front()};
-    return {.object = capabilities(provider, wanted), .isMachineEmpty = sensors.empty()};
+    ObjectFound found;
+    if (const Host::ObjectPath* const path = provider_.readPath(wanted)) {
+        found.object = provider_.instance(*path);
+        found.complaint = "there is no object with the path \"" + wanted + "\"";
+        return found;
+    }
+    for (const Sensor& sensor : sensors()) {
+        if (sensor.deviceId == wanted) {
+            found.choices = {sensor};
+            break;
+        }
+        if (selects(wanted, sensor))
+            found.choices.push_back(sensor);
+    }
+    if (found.choices.size() > 1)
+        found.complaint = "\"" + wanted + "\" is ambiguous; choose one of its " +
+                          std::to_string(found.choices.size()) + " sensors:";
+    else if (found.choices.size() == 1)
+        found.object = found.choices.front().instance;
+    else
+        found.object = capabilities(provider_, wanted);
+    found.isMachineEmpty = sensors().empty();
+    if (found.complaint.empty())
+        found.complaint = nothingMatches(wanted, sensors());
+    return found;
+}
+
+const Sensors& ObjectSearch::sensors()
+{
+    if (!sensors_)
+        sensors_ = readSensors(provider_, true);
+    return *sensors_;
 }
 
 } // namespace Tools

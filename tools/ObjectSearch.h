@@ -4,24 +4,38 @@
 
 #pragma once
 
-#include <string>
+#include "tools/sensors/SensorList.h"
 
-namespace Host {
-class Instance;
-}
+#include <optional>
+#include <string>
 
 namespace Tools {
 
 class ProviderClient;
 
 struct ObjectFound {
-    const Host::Instance* object = nullptr; // null when there is none
+    const Host::Instance* object = nullptr; // null unless one object matches
+    Sensors choices;                        // the sensors that match
     bool isMachineEmpty = false;            // the machine has no sensors
+    std::string complaint;                  // why there is no object
 };
 
-// Finds an object by object path, DeviceID, name of a sensor or InstanceID, in this order. Throws
-// UsageError for a malformed path, and std::runtime_error when several sensors have the name or a
-// provider fails.
-ObjectFound findObject(ProviderClient& provider, const std::string& wanted);
+// Reads the sensors once, when it needs them first.
+class ObjectSearch {
+public:
+    // The provider must outlive the object.
+    explicit ObjectSearch(ProviderClient& provider) : provider_(provider) {}
+
+    // Finds an object by object path, by DeviceID, by a selector that only one sensor matches, or by
+    // InstanceID, in this order. Throws UsageError for a malformed path, and std::runtime_error when
+    // a provider fails.
+    ObjectFound find(const std::string& wanted);
+
+private:
+    const Sensors& sensors();
+
+    ProviderClient& provider_;
+    std::optional<Sensors> sensors_;
+};
 
 } // namespace Tools

@@ -8,6 +8,7 @@
 
 #include <CLI/CLI.hpp>
 
+#include <algorithm>
 #include <cstdlib>
 #include <filesystem>
 
@@ -35,6 +36,16 @@ void SourceOptions::selectMachine() const
     const std::string entry =
         Vorn::formatSourceEntry("model", std::filesystem::absolute(*model_).string());
     ::setenv("VORN_INSTRUMENTATION", entry.c_str(), 1);
+}
+
+bool SourceOptions::readsHwmon() const
+{
+    const char* const sources = std::getenv("VORN_INSTRUMENTATION");
+    if (sources == nullptr || *sources == '\0')
+        return true;
+    const auto entries = Vorn::parseSourceList(sources);
+    return std::any_of(entries.begin(), entries.end(),
+        [](const Vorn::SourceEntry& entry) { return entry.scheme == "hwmon"; });
 }
 
 ProviderFiles SourceOptions::providerFiles() const

@@ -29,6 +29,9 @@ public:
     // and there are no other threads.
     void selectMachine() const;
 
+    // Returns whether the sensors are those of the kernel. REQUIRES: selectMachine() was called.
+    bool readsHwmon() const;
+
     // Throws std::runtime_error when no library is given and none is found.
     ProviderFiles providerFiles() const;
 

@@ -39,7 +39,8 @@ TEST(CompletionTest, OffersCommands)
 TEST(CompletionTest, OffersTheOptionsOfTheCommand)
 {
     EXPECT_THAT(offersFor({"list", "--"}),
-        testing::UnorderedElementsAre("--help", "--model", "--provider", "--json", "--color"));
+        testing::UnorderedElementsAre("--help", "--model", "--provider", "--json", "--cim",
+            "--flat", "--csv", "--color", "--kind", "--problems"));
     EXPECT_THAT(offersFor({"record", "--o"}), ElementsAre("--output"));
     EXPECT_THAT(offersFor({"--v"}), ElementsAre("--version"));
 }
@@ -54,10 +55,20 @@ TEST(CompletionTest, OffersValues)
     EXPECT_THAT(offersFor({"serve", "--user", "roo"}), Contains("root"));
 }
 
+TEST(CompletionTest, OffersChipsAndLabels)
+{
+    const std::string model = installedFile("share/sensor-profile/demo-model.json");
+    EXPECT_THAT(
+        offersFor({"list", "--model", model, "NVMe"}), ElementsAre("NVMe 1 Temp", "NVMe 2 Temp"));
+    EXPECT_THAT(offersFor({"get", "--model", model, "--json", "system/n"}),
+        ElementsAre("system/nic1", "system/nvme1", "system/nvme2"));
+    EXPECT_THAT(offersFor({"list", "--kind", "v"}), ElementsAre("voltage"));
+}
+
 TEST(CompletionTest, OffersNoFilesForOtherThings)
 {
     EXPECT_THAT(offersFor({"get", "/etc/host"}), testing::IsEmpty());
-    EXPECT_THAT(offersFor({"get", "--json", "/etc/host"}), testing::IsEmpty());
+    EXPECT_THAT(offersFor({"get", "--cim", "/etc/host"}), testing::IsEmpty());
     EXPECT_THAT(offersFor({"serve", "--port", "/etc/host"}), testing::IsEmpty());
 }
 

@@ -45,7 +45,7 @@ const std::vector<std::string> toolFiles = {"bin/sensorctl", "etc/sensor-profile
     "lib/systemd/system/sensor-profile.service", "share/bash-completion/completions/sensorctl",
     "share/doc/sensor-profile/changelog.gz", "share/man/man1/sensorctl.1.gz",
     "share/sensor-profile/demo-model.json", "share/sensor-profile/host.mof",
-    "share/sensor-profile/interop.mof"};
+    "share/sensor-profile/interop.mof", "share/sensor-profile/sensorctl-list.schema.json"};
 
 TEST(InstalledTest, AreTheProviderAndTheTool)
 {
@@ -67,7 +67,7 @@ TEST(InstalledTest, ToolShowsTheDemonstration)
 {
     const Ended ended =
         run({"list", "--model", installedFile("share/sensor-profile/demo-model.json")},
-            installedTool({{"COLUMNS", "80"}}));
+            installedTool({{"COLUMNS", "80"}, {"LC_ALL", "C.UTF-8"}}));
     EXPECT_EQ(ended.err, "");
     EXPECT_EQ(ended.code, 0);
     EXPECT_EQ(
@@ -79,7 +79,7 @@ TEST(InstalledTest, ToolFindsTheCatalogs)
     for (const auto& [language, text] :
         std::map<std::string, std::string>{{"de_DE.UTF-8", "Numerischer Sensor"},
             {"fr_FR.UTF-8", "Capteur"}, {"es_ES.UTF-8", "Sensor num"}, {"C", "Numeric sensor"}}) {
-        const Ended ended = run({"get", "12 V", "--json", "--model",
+        const Ended ended = run({"get", "12 V", "--cim", "--model",
                                     installedFile("share/sensor-profile/demo-model.json")},
             installedTool({{"LC_ALL", language}}));
         ASSERT_EQ(ended.code, 0) << ended.err;

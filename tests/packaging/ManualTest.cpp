@@ -164,7 +164,7 @@ nlohmann::json shownWith(unsigned status)
     const std::string model = files.write("model.json",
         R"({"nodes": [{"type": "voltage", "path": "/1", "description": "S", "status": )" +
             std::to_string(status) + "}]}");
-    const auto document = nlohmann::json::parse(run({"list", "--json", "--model", model}).out);
+    const auto document = nlohmann::json::parse(run({"list", "--cim", "--model", model}).out);
     return document["instances"][0]["properties"];
 }
 
@@ -220,7 +220,7 @@ TEST(OperationsPageTest, TellsOfEveryProperty)
             partOf(page, start, std::regex("\n(A|The) [a-z]+,? (`|have)|\n## "));
         EXPECT_THAT(part, HasSubstr("`" + className + "`"));
         const auto document =
-            nlohmann::json::parse(run({"list", className, "--json", "--model", model}).out);
+            nlohmann::json::parse(run({"list", className, "--cim", "--model", model}).out);
         for (const auto& instance : document["instances"])
             for (const auto& [name, value] : instance["properties"].items()) {
                 ++properties;

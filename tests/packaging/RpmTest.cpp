@@ -254,7 +254,8 @@ TEST_F(RpmRootTest, WorksOnceItIsInstalled)
     EXPECT_EQ(rpm("-V " + provider + " " + tool), "");
     const fs::path usr = root_.path() / "usr";
     EXPECT_EQ(run({"list", "--model", usr / "share/sensor-profile/demo-model.json"},
-                  {.program = usr / "bin/sensorctl", .environment = {{"COLUMNS", "80"}}})
+                  {.program = usr / "bin/sensorctl",
+                      .environment = {{"COLUMNS", "80"}, {"LC_ALL", "C.UTF-8"}}})
                   .out,
         contentOf(SENSOR_PROFILE_SOURCE_DIR "/tests/data/tools/demonstration-list.txt"));
     EXPECT_THAT(inRoot("sensor-profile-register --help"), HasSubstr("register"));

@@ -30,7 +30,7 @@ protected:
 
     json document(const std::string& className) const
     {
-        const Ended ended = listed(className, {"--json"});
+        const Ended ended = listed(className, {"--cim"});
         EXPECT_EQ(ended.code, 0) << ended.err;
         EXPECT_EQ(ended.err, "");
         return json::parse(ended.out);
@@ -77,18 +77,23 @@ TEST_F(ClassesTest, TableOfASuperclassNamesEachObjectsClass)
 
 TEST_F(ClassesTest, ClassNamesAreOfEitherCase)
 {
-    EXPECT_EQ(listed("zumlo_COMPUTERsystem", {"--json"}).out,
-        listed("ZUMLO_ComputerSystem", {"--json"}).out);
+    EXPECT_EQ(listed("zumlo_COMPUTERsystem", {"--cim"}).out,
+        listed("ZUMLO_ComputerSystem", {"--cim"}).out);
 }
 
-TEST_F(ClassesTest, UnknownClassIsWrongUsage)
+TEST_F(ClassesTest, UnknownClassIsASelectorThatNothingMatches)
 {
     const Ended ended = listed("ZUMLO_Unheard");
-    EXPECT_EQ(ended.code, 2);
+    EXPECT_EQ(ended.code, 3);
     EXPECT_EQ(ended.out, "");
-    EXPECT_THAT(
-        ended.err, AllOf(StartsWith("sensorctl: unknown class \"ZUMLO_Unheard\"; there are "),
-                       HasSubstr(" ZUMLO_ComputerSystem")));
+    EXPECT_EQ(ended.err, "sensorctl: no sensor matches \"ZUMLO_Unheard\"\n");
+}
+
+TEST_F(ClassesTest, CsvIsForSensors)
+{
+    const Ended ended = listed("ZUMLO_ComputerSystem", {"--csv"});
+    EXPECT_EQ(ended.code, 2);
+    EXPECT_THAT(ended.err, HasSubstr("--csv is for sensors"));
 }
 
 TEST_F(ClassesTest, DocumentsHaveOneShape)
@@ -124,7 +129,7 @@ TEST_F(ClassesTest, EveryPathThatIsListedCanBeFetched)
     for (const std::string& className : classes)
         for (const json& instance : instances(className)) {
             const std::string path = instance["path"];
-            const Ended ended = run({"get", path, "--json", "--model", smallModel()});
+            const Ended ended = run({"get", path, "--cim", "--model", smallModel()});
             EXPECT_EQ(ended.code, 0) << path << "\n" << ended.err;
             EXPECT_EQ(
                 json::parse(ended.out), json({{"namespace", "root/cimv2"}, {"class", className},
@@ -194,7 +199,7 @@ TEST_F(ClassesTest, MistakeInAPathIsWrongUsage)
 
 TEST_F(ClassesTest, ClassWithoutObjectsIsSaid)
 {
-    const Ended ended = run({"list", "ZUMLO_SensorSystemDevice", "--json", "--model", model("")});
+    const Ended ended = run({"list", "ZUMLO_SensorSystemDevice", "--cim", "--model", model("")});
     EXPECT_EQ(ended.code, 3);
     EXPECT_EQ(json::parse(ended.out).at("instances"), json::array());
     EXPECT_EQ(ended.err, "sensorctl: there are no objects of the class "

@@ -1,7 +1,7 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
 // The demonstration machine, which is shown where a machine has no sensors. The expected output is
-// that of `COLUMNS=80 sensorctl list --model schema/demo-model.json`.
+// that of `COLUMNS=80 LC_ALL=C.UTF-8 sensorctl list --model schema/demo-model.json`.
 
 #include "tests/tools/ToolTest.h"
 #include "tools/output/Utf8.h"
@@ -20,8 +20,8 @@ const std::string golden = SENSOR_PROFILE_SOURCE_DIR "/tests/data/tools/demonstr
 
 TEST(DemonstrationTest, ListIsTheGoldenOutput)
 {
-    const Ended ended =
-        run({"list", "--model", demonstration}, {.environment = {{"COLUMNS", "80"}}});
+    const Ended ended = run({"list", "--model", demonstration},
+        {.environment = {{"COLUMNS", "80"}, {"LC_ALL", "C.UTF-8"}}});
     EXPECT_EQ(ended.code, 0);
     EXPECT_EQ(ended.err, "");
     EXPECT_EQ(ended.out, contentOf(golden));
@@ -40,16 +40,16 @@ TEST(DemonstrationTest, ListFitsATerminalWithoutCuttingNames)
 TEST(DemonstrationTest, DocumentHoldsEveryNodeOfTheFile)
 {
     const json file = json::parse(contentOf(demonstration));
-    const json document = json::parse(run({"list", "--json", "--model", demonstration}).out);
+    const json document = json::parse(run({"list", "--cim", "--model", demonstration}).out);
     EXPECT_EQ(document["instances"].size(), file["nodes"].size());
 }
 
 TEST(DemonstrationTest, EverySensorCanBeFetchedByItsId)
 {
-    const json document = json::parse(run({"list", "--json", "--model", demonstration}).out);
+    const json document = json::parse(run({"list", "--cim", "--model", demonstration}).out);
     for (const json& instance : document["instances"]) {
         const std::string id = instance["properties"]["DeviceID"];
-        const Ended ended = run({"get", id, "--json", "--model", demonstration});
+        const Ended ended = run({"get", id, "--cim", "--model", demonstration});
         EXPECT_EQ(ended.code, 0) << id;
         EXPECT_EQ(json::parse(ended.out)["instances"], json::array({instance}));
     }
@@ -60,7 +60,7 @@ TEST(DemonstrationTest, RecordReplaysToTheSameOutput)
     const TemporaryFolder folder;
     const std::string file = (folder.path() / "record.json").string();
     ASSERT_EQ(run({"record", "--model", demonstration, "-o", file}).code, 0);
-    for (const char* const form : {"--json", "--color=never"})
+    for (const char* const form : {"--cim", "--color=never"})
         EXPECT_EQ(run({"list", form, "--model", file}).out,
             run({"list", form, "--model", demonstration}).out);
 }

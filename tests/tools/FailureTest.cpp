@@ -19,7 +19,7 @@ protected:
     std::vector<std::vector<std::string>> everyCommand() const
     {
         const std::string file = smallModel();
-        return {{"list", "--model", file}, {"list", "--json", "--model", file},
+        return {{"list", "--model", file}, {"list", "--cim", "--model", file},
             {"get", "CPU 1", "--model", file}, {"walk", "--model", file},
             {"list", "ZUMLO_ComputerSystem", "--model", file}, {"record", "--model", file},
             {"--help"}, {"--version"}};
@@ -85,7 +85,7 @@ TEST_F(FailureTest, EveryKindOfBadModelIsAFailure)
         folder_.write("array.json", "[]"),
         folder_.write("member.json", R"({"nodes": [], "more": 1})")};
     for (const std::string& file : files) {
-        const Ended ended = run({"list", "--json", "--model", file});
+        const Ended ended = run({"list", "--cim", "--model", file});
         EXPECT_EQ(ended.code, 1) << file;
         EXPECT_EQ(ended.out, "");
         EXPECT_THAT(ended.err, AllOf(StartsWith("sensorctl: "), HasSubstr(file)));
@@ -95,7 +95,7 @@ TEST_F(FailureTest, EveryKindOfBadModelIsAFailure)
 TEST_F(FailureTest, InstrumentationThatCannotBeUsedIsTheReason)
 {
     for (const std::vector<std::string>& arguments : std::vector<std::vector<std::string>>{{"list"},
-             {"list", "--json"}, {"list", "ZUMLO_SensorSystemDevice"}, {"get", "CPU 1"}, {"record"},
+             {"list", "--cim"}, {"list", "ZUMLO_SensorSystemDevice"}, {"get", "CPU 1"}, {"record"},
              {"walk"}, {"walk", "CPU 1"}}) {
         const Ended ended = run(arguments, {.environment = {{"VORN_INSTRUMENTATION", "abacus"}}});
         EXPECT_EQ(ended.code, 1);

@@ -21,9 +21,32 @@ protected:
     }
 };
 
-TEST_F(GetTest, ShowsEveryPropertyWithTheMeaningsOfCodes)
+TEST_F(GetTest, ShowsReadingStateAndLimitsFirst)
 {
     const Ended ended = got("+12V:/board/in1");
+    EXPECT_EQ(ended.code, 0);
+    EXPECT_EQ(ended.err, "");
+    EXPECT_EQ(ended.out, "+12V\n"
+                         "  Reading        12.75 V\n"
+                         "  State          Warning high\n"
+                         "  Low critical   10.5 V\n"
+                         "  High warning   12.5 V\n"
+                         "  Kind           voltage\n"
+                         "  Chip           board\n"
+                         "  Path           /board/in1\n"
+                         "  DeviceID       +12V:/board/in1\n");
+}
+
+TEST_F(GetTest, ShowsSeveralSensors)
+{
+    const Ended ended = got("+12V", {"cpu1"});
+    EXPECT_EQ(ended.code, 0);
+    EXPECT_EQ(ended.out, got("+12V").out + "\n" + got("CPU 2").out);
+}
+
+TEST_F(GetTest, ShowsEveryPropertyWithTheMeaningsOfCodes)
+{
+    const Ended ended = got("+12V:/board/in1", {"--verbose"});
     EXPECT_EQ(ended.code, 0);
     EXPECT_EQ(ended.err, "");
     EXPECT_EQ(linesOf(ended.out).front(), "+12V");
@@ -36,7 +59,7 @@ TEST_F(GetTest, ShowsEveryPropertyWithTheMeaningsOfCodes)
              "\n  RequestedState             2 (Enabled)\n",
              "\n  HealthState                10 (Degraded/Warning)\n",
              "\n  OperationalStatus          0 (Unknown)\n",
-             "\n  CurrentReading             12750 (12.750 V)\n",
+             "\n  CurrentReading             12750 (12.75 V)\n",
              "\n  UnitModifier               -3\n",
              "\n  LowerThresholdCritical     10500 (10.5 V)\n",
              "\n  SupportedThresholds        0 (LowerThresholdNonCritical), 1 (Upper",
@@ -47,37 +70,54 @@ TEST_F(GetTest, ShowsEveryPropertyWithTheMeaningsOfCodes)
 
 TEST_F(GetTest, SaysThatALostSensorHasNoReading)
 {
-    EXPECT_THAT(got("Fan:/board/fan2").out,
+    EXPECT_THAT(got("Fan:/board/fan2").out, HasSubstr("  Reading        -\n"));
+    EXPECT_THAT(got("Fan:/board/fan2", {"-v"}).out,
         AllOf(HasSubstr("CurrentReading           0 (no reading)\n"),
             HasSubstr("OperationalStatus        13 (Lost Communication)\n")));
 }
 
-TEST_F(GetTest, AcceptsANameThatOnlyOneSensorHas)
+TEST_F(GetTest, AcceptsWhatOnlyOneSensorMatches)
 {
-    EXPECT_EQ(got("CPU 2").out, got("CPU 2:/cpu1/temp1").out);
     EXPECT_EQ(got("CPU 2").code, 0);
+    for (const char* const wanted : {"CPU 2:/cpu1/temp1", "cpu 2", "/cpu1/temp1", "cpu1",
+             "cpu1/temp1", "CPU1/cpu 2", "*2:/cpu1*", "cpu [2-9]"})
+        EXPECT_EQ(got(wanted).out, got("CPU 2").out) << wanted;
 }
 
-TEST_F(GetTest, RefusesANameOfSeveralSensorsAndListsTheirIds)
+TEST_F(GetTest, OffersTheChoicesOfAnAmbiguousNameAsLinesToCopy)
 {
     const Ended ended = got("Fan");
     EXPECT_EQ(ended.code, 1);
     EXPECT_EQ(ended.out, "");
-    EXPECT_EQ(ended.err,
-        "sensorctl: several sensors are named \"Fan\"; give one of their DeviceIDs: "
-        "\"Fan:/board/fan1\" \"Fan:/board/fan2\"\n");
+    const std::string start = "\n  sensorctl get --model '" + smallModel() + "' 'Fan:/board/fan";
+    EXPECT_EQ(ended.err, "sensorctl: \"Fan\" is ambiguous; choose one of its 2 sensors:" + start +
+                             "1'" + start + "2'\n");
+    const std::string line = linesOf(ended.err).back();
+    const std::string command = sensorctl + line.substr(line.find(" get"));
+    EXPECT_THAT(run({"-c", command}, {.program = "/bin/sh"}).out, HasSubstr("/board/fan2\n"));
 }
 
-TEST_F(GetTest, UnknownSensorIsNotFound)
+TEST_F(GetTest, ChoicesAreQuotedForTheShell)
 {
-    for (const std::string wanted : {"CPU 3", "", "list", "cpu 1"}) {
-        const Ended ended = got(wanted);
-        EXPECT_EQ(ended.code, 3) << wanted;
-        EXPECT_EQ(ended.out, "");
-        EXPECT_EQ(ended.err,
-            "sensorctl: no object has the DeviceID, the name, the InstanceID or the path \"" +
-                wanted + "\"\n");
-    }
+    const std::string file = model(R"(
+        { "type": "voltage", "path": "/a", "description": "-it's", "status": 1 },
+        { "type": "voltage", "path": "/b", "description": "-it's", "status": 1 })");
+    const Ended ended = run({"get", "--model", file, "--", "-it's"});
+    const std::string line = linesOf(ended.err).back();
+    EXPECT_THAT(line, testing::EndsWith(R"( -- '-it'\''s:/b')"));
+}
+
+TEST_F(GetTest, WhatNothingMatchesHasTheNearestNames)
+{
+    const Ended ended = got("CPU 3");
+    EXPECT_EQ(ended.code, 3);
+    EXPECT_EQ(ended.out, "");
+    EXPECT_EQ(ended.err, "sensorctl: no sensor matches \"CPU 3\"; what comes nearest: \"CPU 1\", "
+                         "\"CPU 2\", \"cpu0\"\n");
+    for (const std::string wanted : {"xyz", "", "list"})
+        EXPECT_EQ(got(wanted).err, "sensorctl: no sensor matches \"" + wanted + "\"\n");
+    EXPECT_EQ(got("ZUMLO_NumericSensor.DeviceID=\"none\"").err,
+        "sensorctl: there is no object with the path \"ZUMLO_NumericSensor.DeviceID=\"none\"\"\n");
 }
 
 TEST_F(GetTest, IdThatBeginsWithADashFollowsTwoDashes)
@@ -94,19 +134,19 @@ TEST_F(GetTest, MachineWithoutSensorsIsSaid)
     EXPECT_THAT(ended.err, HasSubstr("this machine has no sensors"));
 }
 
-TEST_F(GetTest, JsonIsTheListsDocumentWithOneInstance)
+TEST_F(GetTest, CimIsTheListsDocumentWithOneInstance)
 {
-    const Ended ended = got("CPU 1:/cpu0/temp1", {"--json"});
-    const json all = json::parse(run({"list", "--json", "--model", smallModel()}).out);
+    const Ended ended = got("CPU 1:/cpu0/temp1", {"--cim"});
+    const json all = json::parse(run({"list", "--cim", "--model", smallModel()}).out);
     json expected = all;
-    expected["instances"] = json::array({all["instances"][1]});
+    expected["instances"] = json::array({all["instances"][3]});
     EXPECT_EQ(json::parse(ended.out), expected);
 }
 
 TEST_F(GetTest, LongListsGoOnInTheNextLine)
 {
     const Ended ended =
-        run({"get", "CPU 1", "--model", smallModel()}, {.environment = {{"COLUMNS", "80"}}});
+        run({"get", "-v", "CPU 1", "--model", smallModel()}, {.environment = {{"COLUMNS", "80"}}});
     for (const std::string& line : linesOf(ended.out)) {
         if (line.find("Description ") == std::string::npos) {
             EXPECT_LE(line.size(), 81U) << line; // the degree sign is two bytes

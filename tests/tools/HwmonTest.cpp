@@ -29,7 +29,7 @@ std::map<std::string, json> recordedNodes()
 
 std::map<std::string, json> listedSensors()
 {
-    const Ended ended = run({"list", "--json"});
+    const Ended ended = run({"list", "--cim"});
     EXPECT_EQ(ended.code, 0) << ended.err;
     std::map<std::string, json> found;
     const json document = json::parse(ended.out);
@@ -124,8 +124,8 @@ TEST_P(HwmonTest, RecordReplaysToTheSameOutput)
     const TemporaryFolder folder;
     const std::string file = (folder.path() / "record.json").string();
     ASSERT_EQ(run({"record", "-o", file}).code, 0);
-    EXPECT_EQ(run({"list", "--json", "--model", file}).out, run({"list", "--json"}).out);
-    EXPECT_EQ(run({"list", "--model", file}).out, run({"list"}).out);
+    EXPECT_EQ(run({"list", "--cim", "--model", file}).out, run({"list", "--cim"}).out);
+    EXPECT_EQ(run({"list", "--flat", "--model", file}).out, run({"list", "--flat"}).out);
 }
 
 INSTANTIATE_TEST_SUITE_P(Machines, HwmonTest,
@@ -135,6 +135,64 @@ INSTANTIATE_TEST_SUITE_P(Machines, HwmonTest,
         return std::get<0>(machine.param) +
                std::string(std::get<1>(machine.param) ? "Configured" : "");
     });
+
+// The chips of a machine as `list --json` names them.
+std::map<std::string, std::string> devices()
+{
+    std::map<std::string, std::string> found;
+    for (const json& sensor : json::parse(run({"list", "--json"}).out))
+        found[sensor.at("chip")] = sensor.at("device").is_null() ? "" : sensor.at("device");
+    return found;
+}
+
+class ChipDevicesTest : public MountNamespaceTest {
+protected:
+    void SetUp() override
+    {
+        MountNamespaceTest::SetUp();
+        if (!IsSkipped() && !HasFailure())
+            sysfs_.emplace("");
+    }
+
+    // Adds a chip with a temperature, whose device is at the path below the tree.
+    void add(const std::string& folder, const std::string& name, const std::string& bus,
+        const std::string& device)
+    {
+        sysfs_->addChip(folder, name, bus, device);
+        sysfs_->write("hwmon/" + folder + "/temp1_input", "41000\n");
+    }
+
+    std::optional<BoundSysfs> sysfs_;
+};
+
+TEST_F(ChipDevicesTest, AreNamedWhereTheKernelKnowsThem)
+{
+    add("hwmon0", "drivetemp", "scsi", "7:0:0:0");
+    sysfs_->write("hwmon/hwmon0/device/model", "WDC WD80EFAX    \n");
+    add("hwmon1", "mlx5", "pci", "0000:3b:00.1");
+    std::filesystem::create_directories(sysfs_->path("hwmon/hwmon1/device/net/eth4"));
+    add("hwmon2", "jc42", "i2c", "0-0018");
+    add("hwmon3", "nvme", "pci", "10000:01:00.0");
+    sysfs_->write("hwmon/hwmon3/device/model", "SOLIDIGM\n");
+    EXPECT_EQ(devices(),
+        (std::map<std::string, std::string>{{"drivetemp-scsi-7-0", "WDC WD80EFAX"},
+            {"mlx5-pci-3b01", "eth4"}, {"jc42-i2c-0-18", ""}, {"nvme-pci-0100", "SOLIDIGM"}}));
+    EXPECT_THAT(run({"list"}).out, testing::HasSubstr("\ndrivetemp-scsi-7-0   (WDC WD80EFAX)\n"));
+    EXPECT_THAT(
+        run({"get", "drivetemp*"}).out, testing::HasSubstr("\n  Device         WDC WD80EFAX\n"));
+}
+
+TEST_F(ChipDevicesTest, ChannelsOfOtherKindsAreCounted)
+{
+    add("hwmon0", "testchip", "platform", "testchip.656");
+    for (const char* const attribute : {"curr1_input", "power1_average", "power1_input",
+             "power2_average", "energy1_input", "humidity1_input", "power1_cap", "intrusion0_beep"})
+        sysfs_->write(std::string("hwmon/hwmon0/") + attribute, "0\n");
+    EXPECT_EQ(linesOf(run({"list"}).out).back(),
+        "1 sensor: 1 normal.  5 channels of other kinds are not shown (current, energy, humidity, "
+        "power).");
+    EXPECT_EQ(linesOf(run({"list", "temp1"}).out).back(), "1 sensor: 1 normal.");
+}
 
 class HwmonAbsentTest : public MountNamespaceTest {};
 

@@ -79,12 +79,28 @@ TEST_F(ObjectTreeTest, AnObjectIsDescendedOnceAndNamedWhereItComesAgain)
     link("b", "d");
     link("c", "d");
     link("d", "e");
+    link("c", "f");
     EXPECT_EQ(tree("a"), "a (Object)\n"
                          "|- Down b (Link)\n"
                          "|  `- Down d (Link)\n"
                          "|     `- Down e (Link)\n"
                          "`- Down c (Link)\n"
-                         "   `- Down d (Link) ...\n");
+                         "   |- Down d (Link) ...\n"
+                         "   `- Down f (Link)\n");
+}
+
+TEST_F(ObjectTreeTest, WhatIsTheSameBelowSeveralObjectsIsWrittenOnce)
+{
+    link("a", "b");
+    link("a", "c");
+    link("b", "d");
+    link("c", "d");
+    link("d", "e");
+    EXPECT_EQ(tree("a"), "a (Object)\n"
+                         "|- Down b (Link)\n"
+                         "|- Down c (Link)\n"
+                         "`- each Down: Down d (Link)\n"
+                         "   `- Down e (Link)\n");
 }
 
 TEST_F(ObjectTreeTest, CirclesEnd)
@@ -103,8 +119,8 @@ TEST_F(ObjectTreeTest, CirclesEnd)
 TEST_F(ObjectTreeTest, TheRemarkGivesWayFirst)
 {
     link("a", "bcdefgh");
-    EXPECT_EQ(tree("a", 18), "a (Object)\n`- Down bcdefgh (…\n");
-    EXPECT_EQ(tree("a", 10), "a (Object)\n`- Down b…\n");
+    EXPECT_EQ(tree("a", 18), "a (Object)\n`- Down bcdefgh (~\n");
+    EXPECT_EQ(tree("a", 10), "a (Object)\n`- Down b~\n");
 }
 
 TEST_F(ObjectTreeTest, ObjectsAreTheSameHoweverTheirPathsAreWritten)

@@ -32,7 +32,7 @@ TEST_F(RecordTest, ReplaysToTheSameOutput)
     EXPECT_EQ(recorded.err, "");
     const std::string replay = folder_.write("replay.json", recorded.out);
     for (const std::vector<std::string>& arguments :
-        std::vector<std::vector<std::string>>{{"list"}, {"list", "--json"}, {"get", "CPU 1"}}) {
+        std::vector<std::vector<std::string>>{{"list"}, {"list", "--cim"}, {"get", "CPU 1"}}) {
         std::vector<std::string> first = arguments;
         std::vector<std::string> second = arguments;
         first.insert(first.end(), {"--model", original});

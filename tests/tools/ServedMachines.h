@@ -77,7 +77,7 @@ public:
     {
         nlohmann::json& instances = listed_[{machine, name}];
         if (instances.is_null()) {
-            std::vector<std::string> arguments = {"list", name, "--json"};
+            std::vector<std::string> arguments = {"list", name, "--cim"};
             const auto options = optionsOf(machine);
             arguments.insert(arguments.end(), options.begin(), options.end());
             const Ended ended = run(arguments);

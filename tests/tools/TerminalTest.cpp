@@ -38,7 +38,7 @@ TEST_F(TerminalTest, IsColored)
 {
     const Ended ended = runOnTerminal(list(), 80);
     EXPECT_EQ(ended.code, 0);
-    EXPECT_THAT(ended.out, HasSubstr("\x1B[1;31mCritical\x1B[0m"));
+    EXPECT_THAT(ended.out, HasSubstr("\x1B[1;31mCritical high\x1B[0m"));
 }
 
 TEST_F(TerminalTest, IsNotColoredWhenTheUserSaysSo)
@@ -65,7 +65,9 @@ TEST_F(TerminalTest, LinesFitItsWidth)
         "upperCritical": 13.2, "description": ")" +
                                    name + "\" }");
     const auto shown = [&](unsigned short columns) {
-        return runOnTerminal({"list", "--color", "never", "--model", file}, columns).out;
+        return runOnTerminal({"list", "--color", "never", "--model", file}, columns,
+            {{"TERM", "xterm"}, {"LC_ALL", "C.UTF-8"}})
+            .out;
     };
     EXPECT_THAT(shown(80), HasSubstr("…"));
     EXPECT_LE(widest(shown(80)), 80U);

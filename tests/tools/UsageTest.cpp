@@ -48,10 +48,11 @@ TEST(UsageTest, VersionNamesTheToolAndTheInterface)
 
 TEST(UsageTest, WrongUsageIsSaidAndEndsWithTwo)
 {
-    for (const std::vector<std::string>& arguments : std::vector<std::vector<std::string>>{{},
-             {"frobnicate"}, {"list", "extra"}, {"list", "--frobnicate"}, {"list", "--model"},
-             {"list", "--color", "blue"}, {"get"}, {"get", "one", "two"}, {"list", "one", "two"},
-             {"walk", "one", "two"}, {"walk", "--json"}, {"record", "extra"}}) {
+    for (const std::vector<std::string>& arguments :
+        std::vector<std::vector<std::string>>{{}, {"frobnicate"}, {"list", "--kind", "humidity"},
+            {"list", "--csv", "--json"}, {"list", "--cim", "--flat"}, {"list", "--frobnicate"},
+            {"list", "--model"}, {"list", "--color", "blue"}, {"get"}, {"walk", "one", "two"},
+            {"walk", "--json"}, {"record", "extra"}}) {
         const Ended ended = run(arguments);
         EXPECT_EQ(ended.code, 2) << testing::PrintToString(arguments);
         EXPECT_EQ(ended.out, "");

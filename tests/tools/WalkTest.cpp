@@ -40,20 +40,19 @@ TEST_F(WalkTest, GoesFromTheSystemDown)
     const Ended ended = walked();
     EXPECT_EQ(ended.code, 0);
     EXPECT_EQ(ended.err, "");
-    EXPECT_EQ(ended.out, system_ + " (ZUMLO_ComputerSystem)\n"
-                                   "|- PartComponent CPU 1:/cpu0/temp1 (ZUMLO_SensorSystemDevice)\n"
-                                   "|  `- Capabilities ZUMLO:SensorEnabledLogicalElementCap1 "
-                                   "(ZUMLO_SensorElementCapabilities)\n"
-                                   "`- PartComponent Fan:/board/fan1 (ZUMLO_SensorSystemDevice)\n"
-                                   "   `- Capabilities ZUMLO:SensorEnabledLogicalElementCap1 "
-                                   "(ZUMLO_SensorElementCapabilities)\n");
+    EXPECT_EQ(ended.out,
+        system_ + " (ZUMLO_ComputerSystem)\n"
+                  "|- PartComponent CPU 1:/cpu0/temp1 (ZUMLO_SensorSystemDevice)\n"
+                  "|- PartComponent Fan:/board/fan1 (ZUMLO_SensorSystemDevice)\n"
+                  "`- each PartComponent: Capabilities ZUMLO:SensorEnabledLogicalElementCap1 "
+                  "(ZUMLO_SensorElementCapabilities)\n");
 }
 
 TEST_F(WalkTest, DrawsLinesWhereTheLocaleHasThem)
 {
     for (const char* const locale : {"C.UTF-8", "de_DE.utf8"})
         EXPECT_THAT(walked({}, {.environment = {{"LC_ALL", locale}}}).out,
-            HasSubstr("\n│  └─ Capabilities "));
+            HasSubstr("\n└─ each PartComponent: Capabilities "));
 }
 
 TEST_F(WalkTest, BeginsAtAnyObject)
@@ -73,7 +72,7 @@ TEST_F(WalkTest, BeginsAtAnyObject)
     EXPECT_THAT(walked({capabilities}).out,
         AllOf(StartsWith(std::string(capabilities) +
                          " (ZUMLO_SensorEnabledLogicalElementCapabilities)\n|- "),
-            HasSubstr("\n   `- GroupComponent " + system_ + " ")));
+            HasSubstr("\n`- each ManagedElement: GroupComponent " + system_ + " ")));
 }
 
 TEST_F(WalkTest, LinesFitTheWidth)
@@ -111,8 +110,7 @@ TEST_F(WalkTest, UnknownObjectIsNotFound)
     const Ended ended = walked({"nothing"});
     EXPECT_EQ(ended.code, 3);
     EXPECT_EQ(ended.out, "");
-    EXPECT_EQ(ended.err, "sensorctl: no object has the DeviceID, the name, the InstanceID or "
-                         "the path \"nothing\"\n");
+    EXPECT_EQ(ended.err, "sensorctl: no sensor matches \"nothing\"\n");
 }
 
 // The tool with only the library of the sensors installed.

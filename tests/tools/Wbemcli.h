@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Converts the outputs of wbemcli and of `sensorctl --json` to a common form, so that they can be
+// Converts the outputs of wbemcli and of `sensorctl --cim` to a common form, so that they can be
 // compared.
 
 #pragma once
@@ -24,7 +24,7 @@ using PlainInstances = std::multimap<std::string, PlainProperties>; // by path
 
 std::string plain(const std::string& text);
 
-// Converts an object that `sensorctl --json` printed.
+// Converts an object that `sensorctl --cim` printed.
 PlainInstances::value_type plainInstance(const nlohmann::json& instance);
 
 // Converts the instances or classes that `wbemcli -nl` printed.

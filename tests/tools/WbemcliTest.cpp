@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The server with the client wbemcli, which prints the same objects as `sensorctl --json` for each
+// The server with the client wbemcli, which prints the same objects as `sensorctl --cim` for each
 // of its operations.
 
 #include "tests/tools/Wbemcli.h"

@@ -27,6 +27,8 @@ public:
         Index target;
         std::string role;
         std::string associationClass;
+
+        bool operator==(const Link&) const = default;
     };
 
     static constexpr std::size_t unreachable = std::numeric_limits<std::size_t>::max();

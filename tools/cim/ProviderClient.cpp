@@ -32,7 +32,7 @@ ProviderClient::ProviderClient(const ProviderFiles& files)
         if (provider.servesAssociations)
             associations_.push_back(provider.className);
     }
-    request_.emplace(manager_.broker());
+    beginRequest();
 }
 
 std::optional<std::string> ProviderClient::declaredClass(std::string_view className) const
@@ -41,12 +41,17 @@ std::optional<std::string> ProviderClient::declaredClass(std::string_view classN
     return declared == nullptr ? std::nullopt : std::optional(declared->name);
 }
 
-Instances ProviderClient::instances(const std::string& className)
+void ProviderClient::beginRequest()
+{
+    request_.emplace(manager_.broker());
+}
+
+Instances ProviderClient::instances(const std::string& className, const char** properties)
 {
     Host::CollectedResult answer;
     try {
         answer = manager_.enumerateInstances(
-            request_->context(), request_->makePath(nameSpace, className), nullptr);
+            request_->context(), request_->makePath(nameSpace, className), properties);
     } catch (const Host::Refusal& refusal) {
         fail(refusal);
     }
@@ -65,13 +70,6 @@ const Host::Instance* ProviderClient::instance(const Host::ObjectPath& path)
             return nullptr;
         fail(refusal);
     }
-}
-
-const Host::Instance* ProviderClient::sensor(std::string_view deviceId)
-{
-    Host::ObjectPath& path = request_->makePath(nameSpace, sensorClass);
-    path.addKey("DeviceID", Host::Value::text(request_->arena(), deviceId));
-    return instance(path);
 }
 
 const Host::ObjectPath* ProviderClient::readPath(std::string_view text) const

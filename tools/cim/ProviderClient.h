@@ -29,7 +29,7 @@ struct ProviderFiles {
 
 using Instances = std::vector<const Host::Instance*>;
 
-// Owns one request and the objects that it returns. At most one client may exist at a time. The
+// Owns a request and the objects that it returns. At most one client may exist at a time. The
 // constructor throws std::runtime_error when the classes cannot be compiled, the operations when
 // a library cannot be used, a provider returns an error or its answer is incomplete.
 class ProviderClient {
@@ -42,14 +42,14 @@ public:
     const std::vector<std::string>& servedClasses() const { return served_; }
     const std::vector<std::string>& associationClasses() const { return associations_; }
 
-    // Returns the instances of the class and its subclasses in the provider's order.
-    Instances instances(const std::string& className);
+    // Returns the instances of the class and its subclasses in the provider's order, with those
+    // properties of a list that ends with a null; with all where there is no list.
+    Instances instances(const std::string& className, const char** properties = nullptr);
     // Returns null when there is none.
     const Host::Instance* instance(const Host::ObjectPath& path);
 
-    Instances sensors() { return instances(sensorClass); }
-    // Returns null when there is none with that DeviceID.
-    const Host::Instance* sensor(std::string_view deviceId);
+    // Begins another request, which frees the objects of the one before.
+    void beginRequest();
 
     // Returns the path, which the request owns, or null when the text is no path of a known class.
     // Throws UsageError when the path is malformed.

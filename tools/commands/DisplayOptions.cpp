@@ -10,9 +10,27 @@
 
 namespace Tools {
 
+void DisplayOptions::addForm(
+    CLI::App& parser, const char* option, Form form, const char* description)
+{
+    const auto choose = [this, form] {
+        if (form_ != Form::table && form_ != form)
+            throw CLI::ValidationError("only one of --flat, --csv, --json and --cim can be given");
+        form_ = form;
+    };
+    parser.add_flag_callback(option, choose, description);
+}
+
 void DisplayOptions::addJson(CLI::App& parser)
 {
-    parser.add_flag("--json", isJson_, "Print a JSON document");
+    addForm(parser, "--json", Form::json, "Print a JSON document");
+    addForm(parser, "--cim", Form::cim, "Print all CIM properties in a JSON document");
+}
+
+void DisplayOptions::addTables(CLI::App& parser)
+{
+    addForm(parser, "--flat", Form::flat, "Print one line for each sensor");
+    addForm(parser, "--csv", Form::csv, "Print comma-separated values");
 }
 
 void DisplayOptions::addColor(CLI::App& parser)
@@ -23,9 +41,10 @@ void DisplayOptions::addColor(CLI::App& parser)
         ->check(CLI::IsMember(choices).description(""));
 }
 
-bool DisplayOptions::isColored() const
+TextStyle DisplayOptions::style() const
 {
-    return color_ == "always" || (color_ == "auto" && isColorTerminal());
+    const bool isColored = color_ == "always" || (color_ == "auto" && isColorTerminal());
+    return {outputWidth(), isColored, isUtf8Locale()};
 }
 
 } // namespace Tools

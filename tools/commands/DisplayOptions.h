@@ -4,6 +4,8 @@
 
 #pragma once
 
+#include "tools/output/TextStyle.h"
+
 #include <string>
 
 namespace CLI {
@@ -12,18 +14,23 @@ class App;
 
 namespace Tools {
 
+enum class Form { table, flat, csv, json, cim };
+
 // The object must outlive the parser.
 class DisplayOptions {
 public:
-    void addJson(CLI::App& parser);
+    void addJson(CLI::App& parser); // and --cim
+    void addTables(CLI::App& parser);
     void addColor(CLI::App& parser);
 
-    bool isJson() const { return isJson_; }
-    // Returns whether the option, or else the environment, selects colors on standard output.
-    bool isColored() const;
+    Form form() const { return form_; }
+    // Returns the style for standard output by the option, the environment and the terminal.
+    TextStyle style() const;
 
 private:
-    bool isJson_ = false;
+    void addForm(CLI::App& parser, const char* option, Form form, const char* description);
+
+    Form form_ = Form::table;
     std::string color_ = "auto";
 };
 

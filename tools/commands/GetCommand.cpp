@@ -4,15 +4,20 @@
 #include "tools/EmptyMachine.h"
 #include "tools/ObjectSearch.h"
 #include "tools/SourceOptions.h"
+#include "tools/UsageError.h"
 #include "tools/cim/ProviderClient.h"
 #include "tools/commands/Commands.h"
 #include "tools/commands/DisplayOptions.h"
 #include "tools/output/JsonDocument.h"
 #include "tools/output/Output.h"
 #include "tools/output/PropertyList.h"
-#include "tools/output/Terminal.h"
+#include "tools/output/SensorDetails.h"
+#include "tools/output/SensorJson.h"
+#include "tools/sensors/ChipDevices.h"
 
 #include <CLI/CLI.hpp>
+
+#include <algorithm>
 
 namespace Tools {
 
@@ -21,47 +26,80 @@ namespace {
 class GetCommand : public Command {
 public:
     explicit GetCommand(CLI::App& tool)
-        : Command(tool, "get", "Show one object in full, with the meanings of its codes")
+        : Command(tool, "get", "Show single objects, most of all sensors, in detail")
     {
         parser()
             .add_option(
-                "OBJECT", wanted_, "Its DeviceID, InstanceID, object path or unambiguous name")
+                "OBJECT", wanted_, "A selector as for list, an InstanceID or an object path")
             ->required()
             ->type_name("");
-        source_.addModel(parser());
-        source_.addProvider(parser());
+        parser().add_flag(
+            "-v,--verbose", isVerbose_, "Show all properties with the meanings of their codes");
         display_.addJson(parser());
         display_.addColor(parser());
+        source_.addModel(parser());
+        source_.addProvider(parser());
     }
 
     ExitCode run(Output& out) override
     {
         source_.selectMachine();
-        bool isEmpty = false;
-        if (show(out, isEmpty))
+        const ObjectFound missing = show(out);
+        if (missing.complaint.empty())
             return ExitCode::success;
-        return complainOfNoObject(wanted_, isEmpty, source_.model());
+        return complainOfNoObject(missing, "get", source_.model());
     }
 
 private:
-    // Returns false when there is no such object; sets isEmpty when the machine has no sensors.
-    bool show(Output& out, bool& isEmpty) const
+    // Returns the first of the wanted objects that was not found; nothing is printed then.
+    ObjectFound show(Output& out) const
     {
         ProviderClient provider(source_.providerFiles());
-        const ObjectFound found = findObject(provider, wanted_);
-        isEmpty = found.isMachineEmpty;
-        if (found.object == nullptr)
-            return false;
-        if (display_.isJson())
-            writeJson(out, found.object->className(), {found.object});
-        else
-            out.write(propertyList(*found.object, outputWidth(), display_.isColored()));
-        return true;
+        ObjectSearch search(provider);
+        Instances objects;
+        Sensors sensors;
+        for (const std::string& wanted : wanted_) {
+            ObjectFound found = search.find(wanted);
+            if (found.object == nullptr)
+                return found;
+            objects.push_back(found.object);
+            if (found.object->className() == sensorClass)
+                sensors.emplace_back(*found.object);
+        }
+        if (source_.readsHwmon())
+            ChipDevices().nameIn(sensors);
+        write(out, objects, sensors);
+        return {};
     }
 
-    std::string wanted_;
-    SourceOptions source_;
+    void write(Output& out, const Instances& objects, const Sensors& sensors) const
+    {
+        const std::string_view className = objects.front()->className();
+        const bool areOfOneClass = std::all_of(objects.begin(), objects.end(),
+            [&](const Host::Instance* object) { return object->className() == className; });
+        if (display_.form() == Form::cim && areOfOneClass)
+            return writeJson(out, className, objects);
+        if (display_.form() == Form::json && sensors.size() == objects.size())
+            return writeSensorJson(out, sensors);
+        if (display_.form() != Form::table)
+            throw UsageError(display_.form() == Form::json ? "--json is for sensors; --cim for all"
+                                                           : "--cim is for objects of one class");
+        auto sensor = sensors.begin();
+        const char* separator = "";
+        for (const Host::Instance* const object : objects) {
+            const bool isSensor = object->className() == sensorClass;
+            out.write(
+                separator + (isSensor && !isVerbose_ ? sensorDetails(*sensor, display_.style())
+                                                     : propertyList(*object, display_.style())));
+            sensor += isSensor ? 1 : 0;
+            separator = "\n";
+        }
+    }
+
+    std::vector<std::string> wanted_;
+    bool isVerbose_ = false;
     DisplayOptions display_;
+    SourceOptions source_;
 };
 
 } // namespace

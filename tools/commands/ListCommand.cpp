@@ -6,11 +6,15 @@
 #include "tools/cim/ProviderClient.h"
 #include "tools/commands/Commands.h"
 #include "tools/commands/DisplayOptions.h"
+#include "tools/commands/SelectionOptions.h"
 #include "tools/output/JsonDocument.h"
 #include "tools/output/ObjectTable.h"
 #include "tools/output/Output.h"
+#include "tools/output/SensorCsv.h"
+#include "tools/output/SensorJson.h"
 #include "tools/output/SensorTable.h"
-#include "tools/output/Terminal.h"
+#include "tools/output/Utf8.h"
+#include "tools/sensors/ChipDevices.h"
 
 #include <CLI/CLI.hpp>
 
@@ -19,78 +23,123 @@ namespace Tools {
 namespace {
 
 constexpr const char* listFooter =
-    "LOWER and UPPER are limits in the reading's unit, rounded to hundredths:\n"
-    "warning/critical/fatal, with - for one that the sensor lacks. A reading of -\n"
-    "means that the sensor delivers none.\n"
+    "LOW and HIGH are limits in the reading's unit: warning, critical and fatal, with\n"
+    "- for one that the sensor lacks. A reading of - means that there is none.\n"
     "\n"
-    "CLASS may be ZUMLO_ComputerSystem, ZUMLO_SensorSystemDevice,\n"
-    "ZUMLO_SensorElementCapabilities, ZUMLO_SensorEnabledLogicalElementCapabilities,\n"
-    "or a class that these are derived from.";
+    "SELECTOR may be a class, whose objects are shown instead: ZUMLO_ComputerSystem,\n"
+    "ZUMLO_SensorSystemDevice, ZUMLO_SensorElementCapabilities,\n"
+    "ZUMLO_SensorEnabledLogicalElementCapabilities, or one above these.";
 
 class ListCommand : public Command {
 public:
     explicit ListCommand(CLI::App& tool)
-        : Command(tool, "list", "Show all sensors with their readings, states and limits")
+        : Command(tool, "list", "Show the sensors with their readings, states and limits")
     {
-        parser()
-            .add_option(
-                "CLASS", className_, "Show the objects of this class instead of the sensors")
-            ->type_name("");
+        selection_.addTo(parser());
+        selection_.addProblems(parser());
+        display_.addJson(parser());
+        display_.addTables(parser());
+        display_.addColor(parser());
         source_.addModel(parser());
         source_.addProvider(parser());
-        display_.addJson(parser());
-        display_.addColor(parser());
         parser().footer(listFooter);
     }
 
     ExitCode run(Output& out) override
     {
         source_.selectMachine();
-        if (show(out))
-            return ExitCode::success;
-        if (className_ == sensorClass)
-            checkMachineIsEmpty();
-        else
+        std::string className = sensorClass;
+        if (const auto code = show(out, className))
+            return *code;
+        if (className != sensorClass) {
             countSensors(); // throws for an unreadable machine, of which providers return nothing
-        if (display_.isJson())
-            writeJson(out, className_, {});
-        if (className_ == sensorClass)
-            return complainOfEmptyMachine(source_.model());
-        complain("there are no objects of the class " + className_);
-        return ExitCode::nothingFound;
+            complain("there are no objects of the class " + className);
+            return ExitCode::nothingFound;
+        }
+        checkMachineIsEmpty();
+        write(out, {});
+        return complainOfEmptyMachine(source_.model());
     }
 
 private:
-    // Returns false when the class has no objects.
-    bool show(Output& out)
+    // Sets the name of the class if the user named one. Returns nothing when there is no object.
+    std::optional<ExitCode> show(Output& out, std::string& className) const
     {
         ProviderClient provider(source_.providerFiles());
-        className_ = declared(provider);
-        const Instances objects = provider.instances(className_);
-        if (objects.empty())
-            return false;
-        if (display_.isJson())
-            writeJson(out, className_, objects);
-        else if (className_ == sensorClass)
-            out.write(sensorTable(objects, outputWidth(), display_.isColored()));
-        else
-            out.write(objectTable(objects, outputWidth(), display_.isColored()));
-        return true;
+        const auto& selectors = selection_.selectors();
+        const auto named =
+            selectors.size() == 1 ? provider.declaredClass(selectors.front()) : std::nullopt;
+        if (named && *named != sensorClass) {
+            className = *named;
+            return showObjects(out, className, provider.instances(className));
+        }
+        const Sensors all = readSensors(provider, display_.form() == Form::cim);
+        if (all.empty())
+            return std::nullopt;
+        const auto selected = named ? SelectionOptions().select(all) : selection_.select(all);
+        write(out, selected.sensors);
+        out.flush();
+        for (const std::string& complaint : selected.complaints)
+            complain(complaint);
+        return selected.complaints.empty() ? ExitCode::success : ExitCode::nothingFound;
     }
 
-    std::string declared(const ProviderClient& provider) const
+    std::optional<ExitCode> showObjects(
+        Output& out, const std::string& className, const Instances& objects) const
     {
-        if (auto className = provider.declaredClass(className_))
-            return *std::move(className);
-        std::string text = "unknown class \"" + className_ + "\"; there are";
-        for (const std::string& served : provider.servedClasses())
-            text.append(" ").append(served);
-        throw UsageError(text);
+        if (display_.form() == Form::csv)
+            throw UsageError("--csv is for sensors, not for objects of the class " + className);
+        if (display_.form() == Form::json || display_.form() == Form::cim)
+            writeJson(out, className, objects);
+        else if (!objects.empty())
+            out.write(objectTable(objects, display_.style()));
+        return objects.empty() ? std::nullopt : std::optional(ExitCode::success);
     }
 
-    std::string className_ = sensorClass;
-    SourceOptions source_;
+    void write(Output& out, Sensors sensors) const
+    {
+        std::optional<ChipDevices> chips;
+        if (source_.readsHwmon() && display_.form() != Form::cim)
+            chips.emplace().nameIn(sensors);
+        switch (display_.form()) {
+        case Form::csv:
+            return writeCsv(out, sensors);
+        case Form::json:
+            return writeSensorJson(out, sensors);
+        case Form::cim:
+            return writeInstances(out, sensors);
+        case Form::flat:
+        case Form::table:
+            break;
+        }
+        if (sensors.empty())
+            return;
+        const bool isGrouped = display_.form() == Form::table;
+        const TextStyle style = display_.style();
+        out.write(sensorTable(sensors, isGrouped ? Grouping::byChip : Grouping::none, style));
+        if (isGrouped)
+            writeSummary(out, summaryOf(sensors), chips ? chips->otherChannels() : "", style);
+    }
+
+    static void writeInstances(Output& out, const Sensors& sensors)
+    {
+        Instances instances;
+        for (const Sensor& sensor : sensors)
+            instances.push_back(sensor.instance);
+        writeJson(out, sensorClass, instances);
+    }
+
+    void writeSummary(
+        Output& out, std::string text, const std::string& others, const TextStyle& style) const
+    {
+        if (!others.empty() && !selection_.isGiven())
+            text += (text.size() + others.size() + 2 <= style.width ? "  " : "\n") + others;
+        out.write(text + "\n");
+    }
+
+    SelectionOptions selection_;
     DisplayOptions display_;
+    SourceOptions source_;
 };
 
 } // namespace

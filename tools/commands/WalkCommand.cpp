@@ -11,7 +11,6 @@
 #include "tools/commands/DisplayOptions.h"
 #include "tools/output/ObjectTree.h"
 #include "tools/output/Output.h"
-#include "tools/output/Terminal.h"
 
 #include <CLI/CLI.hpp>
 
@@ -23,7 +22,8 @@ namespace {
 
 constexpr const char* walkFooter =
     "Each line names an object by its role in an association, with the class of the\n"
-    "association. ... stands where more was shown before.";
+    "association. ... stands where more was shown before, `each' for all objects with\n"
+    "that role.";
 
 class WalkCommand : public Command {
 public:
@@ -42,37 +42,37 @@ public:
     ExitCode run(Output& out) override
     {
         source_.selectMachine();
-        bool isMachineEmpty = false;
-        const ExitCode code = show(out, isMachineEmpty);
+        ObjectFound root;
+        const ExitCode code = show(out, root);
         if (code == ExitCode::nothingFound)
-            return complainOfNothing(isMachineEmpty);
+            return complainOfNothing(root);
         // A provider that cannot read the machine returns no sensors; this call throws then.
         countSensors();
         return code;
     }
 
 private:
-    ExitCode show(Output& out, bool& isMachineEmpty) const
+    ExitCode show(Output& out, ObjectFound& root) const
     {
         ProviderClient provider(source_.providerFiles());
-        const Instances roots = findRoots(provider, isMachineEmpty);
+        const Instances roots = findRoots(provider, root);
         if (roots.empty())
             return ExitCode::nothingFound;
         AssociationGraph graph;
         const bool isWhole = addAssociations(provider, graph);
-        const TreeStyle style = {outputWidth(), display_.isColored(), isUtf8Locale()};
-        for (const Host::Instance* const root : roots)
-            writeTree(out, graph, graph.indexOf(root->objectPath()), style);
+        const TextStyle style = display_.style();
+        for (const Host::Instance* const each : roots)
+            writeTree(out, graph, graph.indexOf(each->objectPath()), style);
         return isWhole ? ExitCode::success : ExitCode::failure;
     }
 
-    Instances findRoots(ProviderClient& provider, bool& isMachineEmpty) const
+    // Sets the root to what was found for the object that the user wants.
+    Instances findRoots(ProviderClient& provider, ObjectFound& root) const
     {
         if (!wanted_)
             return provider.instances(computerSystemClass);
-        const ObjectFound found = findObject(provider, *wanted_);
-        isMachineEmpty = found.isMachineEmpty;
-        return found.object == nullptr ? Instances{} : Instances{found.object};
+        root = ObjectSearch(provider).find(*wanted_);
+        return root.object == nullptr ? Instances{} : Instances{root.object};
     }
 
     // Returns false when a class fails. The tree still shows the associations of the others.
@@ -91,10 +91,10 @@ private:
         return isWhole;
     }
 
-    ExitCode complainOfNothing(bool isMachineEmpty) const
+    ExitCode complainOfNothing(const ObjectFound& root) const
     {
         if (wanted_)
-            return complainOfNoObject(*wanted_, isMachineEmpty, source_.model());
+            return complainOfNoObject(root, "walk", source_.model());
         complain("there is no computer system");
         return ExitCode::nothingFound;
     }

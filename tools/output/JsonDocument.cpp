@@ -12,92 +12,110 @@
 #include "tools/output/JsonText.h"
 #include "tools/output/Output.h"
 
-#include <nlohmann/json.hpp>
-
+#include <array>
+#include <charconv>
 #include <cmath>
-#include <cstddef>
 #include <string>
 
 namespace Tools {
 
 namespace {
 
-using Json = nlohmann::ordered_json;
+// The beginnings of lines, by the depth of what they hold.
+constexpr const char* lineOfInstance = "\n    ";
+constexpr const char* lineOfMember = "\n      ";
+constexpr const char* lineOfProperty = "\n        ";
+constexpr const char* lineOfElement = "\n          ";
 
-constexpr int indentation = 2;
+void appendReal(std::string& json, double number)
+{
+    std::array<char, 32> text{};
+    const auto end = std::to_chars(text.data(), text.data() + text.size(), number).ptr;
+    json.append(text.data(), end);
+}
 
-Json arrayOf(const Host::Array& array);
+void appendValue(std::string& json, const Host::Value& value);
 
-// Returns JSON's null for a null and for a number that is not finite.
-Json jsonOf(const Host::Value& value)
+void appendArray(std::string& json, const Host::Array& array)
+{
+    json += '[';
+    const char* separator = "";
+    for (const Host::Value& element : array.elements()) {
+        json.append(separator).append(lineOfElement);
+        appendValue(json, element);
+        separator = ",";
+    }
+    json.append(array.elements().empty() ? "" : lineOfProperty).append("]");
+}
+
+// Appends null for a null and for a number that is not finite, which JSON has not.
+void appendValue(std::string& json, const Host::Value& value)
 {
     if (const auto text = value.text())
-        return *text;
-    if (const auto boolean = value.boolean())
-        return *boolean;
-    if (const auto number = value.unsignedInteger())
-        return *number;
-    if (const auto number = value.signedInteger())
-        return *number;
-    if (const auto number = value.real())
-        return std::isfinite(*number) ? Json(*number) : Json();
-    if (const Host::Array* const array = value.array())
-        return arrayOf(*array);
-    if (const Host::DateTime* const dateTime = value.dateTime())
-        return dateTime->toText();
-    if (const Host::ObjectPath* const path = value.path())
-        return path->toText();
-    if (const Host::Instance* const instance = value.instance())
-        return Host::toText(*instance);
-    return nullptr;
+        appendString(json, *text);
+    else if (const auto boolean = value.boolean())
+        json += *boolean ? "true" : "false";
+    else if (const auto natural = value.unsignedInteger())
+        json += std::to_string(*natural);
+    else if (const auto integer = value.signedInteger())
+        json += std::to_string(*integer);
+    else if (const auto real = value.real(); real && std::isfinite(*real))
+        appendReal(json, *real);
+    else if (const Host::Array* const array = value.array())
+        appendArray(json, *array);
+    else if (const Host::DateTime* const dateTime = value.dateTime())
+        appendString(json, dateTime->toText());
+    else if (const Host::ObjectPath* const path = value.path())
+        appendString(json, path->toText());
+    else if (const Host::Instance* const instance = value.instance())
+        appendString(json, Host::toText(*instance));
+    else
+        json += "null";
 }
 
-Json arrayOf(const Host::Array& array)
+bool hasValue(const Host::Value& value)
 {
-    Json json = Json::array();
-    for (const Host::Value& element : array.elements())
-        json.push_back(jsonOf(element));
-    return json;
+    const auto real = value.real();
+    return !value.isNull() && (!real || std::isfinite(*real));
 }
 
-Json jsonOf(const Host::Instance& instance)
+void appendInstance(std::string& json, const Host::Instance& instance)
 {
-    Json properties = Json::object();
-    for (const Host::NamedValue& property : instance.properties())
-        if (Json value = jsonOf(property.value); !value.is_null())
-            properties[std::string(*property.name->text())] = std::move(value);
-    return {{"path", instance.objectPath().toText()}, {"properties", std::move(properties)}};
-}
-
-// Serializes the value with its lines indented by the depth. No string contains a line feed.
-std::string serialized(const Json& json, std::size_t depth)
-{
-    const std::string text =
-        escapeUnprintable(json.dump(indentation, ' ', false, Json::error_handler_t::replace));
-    std::string result;
-    for (const char c : text) {
-        result += c;
-        if (c == '\n')
-            result.append(depth * indentation, ' ');
+    json.append("{").append(lineOfMember).append("\"path\": ");
+    appendString(json, instance.objectPath().toText());
+    json.append(",").append(lineOfMember).append("\"properties\": {");
+    const char* separator = "";
+    for (const Host::NamedValue& property : instance.properties()) {
+        if (!hasValue(property.value))
+            continue;
+        json.append(separator).append(lineOfProperty);
+        appendString(json, *property.name->text());
+        json += ": ";
+        appendValue(json, property.value);
+        separator = ",";
     }
-    return result;
+    json.append(*separator == '\0' ? "" : lineOfMember).append("}").append(lineOfInstance).append("}");
 }
 
 } // namespace
 
-// Writes instance by instance, so that the document of a large machine is never in memory as a
-// whole.
 void writeJson(
     Output& out, std::string_view className, const std::vector<const Host::Instance*>& instances)
 {
-    out.write("{\n  \"namespace\": " + serialized(nameSpace, 0) +
-              ",\n  \"class\": " + serialized(className, 0) + ",\n  \"instances\": [");
-    const char* separator = "\n    ";
+    std::string json = "{\n  \"namespace\": ";
+    appendString(json, nameSpace);
+    json += ",\n  \"class\": ";
+    appendString(json, className);
+    json += ",\n  \"instances\": [";
+    const char* separator = "";
     for (const Host::Instance* const instance : instances) {
-        out.write(separator + serialized(jsonOf(*instance), 2));
-        separator = ",\n    ";
+        json.append(separator).append(lineOfInstance);
+        appendInstance(json, *instance);
+        out.write(json);
+        json.clear();
+        separator = ",";
     }
-    out.write(instances.empty() ? "]\n}\n" : "\n  ]\n}\n");
+    out.write(json + (instances.empty() ? "]\n}\n" : "\n  ]\n}\n"));
 }
 
 } // namespace Tools

@@ -81,25 +81,25 @@ std::string titleOf(std::string name)
     return name;
 }
 
-Cell cellOf(const Host::Instance& object, const std::string& property)
+Cell cellOf(const Host::Instance& object, const std::string& property, bool isUtf8)
 {
     const Host::Value* const value = object.property(property);
     if (value == nullptr || value->isNull())
         return {absent, Emphasis::faint};
-    const std::string text = printable(shown(property, *value));
+    const std::string text = printable(shown(property, *value), isUtf8);
     return text.empty() ? Cell{absent, Emphasis::faint} : Cell{text};
 }
 
 } // namespace
 
-std::string objectTable(const Objects& objects, std::size_t width, bool isColored)
+std::string objectTable(const Objects& objects, const TextStyle& style)
 {
     const std::vector<std::string> properties = columnsOf(objects);
     const bool showsClass = properties.empty() || areOfSeveralClasses(objects);
     std::vector<Column> columns;
     columns.reserve(properties.size() + 1);
     for (const std::string& property : properties)
-        columns.push_back({titleOf(printable(property))});
+        columns.push_back({titleOf(printable(property, style.isUtf8))});
     if (showsClass)
         columns.push_back({"CLASS"});
     Table table(columns);
@@ -107,12 +107,12 @@ std::string objectTable(const Objects& objects, std::size_t width, bool isColore
         std::vector<Cell> cells;
         cells.reserve(columns.size());
         for (const std::string& property : properties)
-            cells.push_back(cellOf(*object, property));
+            cells.push_back(cellOf(*object, property, style.isUtf8));
         if (showsClass)
-            cells.push_back({printable(object->className())});
+            cells.push_back({printable(object->className(), style.isUtf8)});
         table.add(std::move(cells));
     }
-    return table.toText(width, isColored);
+    return table.toText(style);
 }
 
 } // namespace Tools

@@ -4,7 +4,8 @@
 
 #pragma once
 
-#include <cstddef>
+#include "tools/output/TextStyle.h"
+
 #include <string>
 #include <vector>
 
@@ -17,6 +18,6 @@ namespace Tools {
 // Returns a table with the identifying keys (of associations, the short names of their ends),
 // names and states that any of the objects has; also the class where there are several.
 std::string objectTable(
-    const std::vector<const Host::Instance*>& objects, std::size_t width, bool isColored);
+    const std::vector<const Host::Instance*>& objects, const TextStyle& style);
 
 } // namespace Tools

@@ -7,6 +7,7 @@
 #include "tools/output/Emphasis.h"
 #include "tools/output/Utf8.h"
 
+#include <algorithm>
 #include <string>
 #include <vector>
 
@@ -30,7 +31,7 @@ constexpr Branch asciiLastBranch = {"`- ", "   "};
 
 class TreeWriter {
 public:
-    TreeWriter(Output& out, const AssociationGraph& graph, Index root, const TreeStyle& style)
+    TreeWriter(Output& out, const AssociationGraph& graph, Index root, const TextStyle& style)
         : out_(out), graph_(graph), style_(style), distances_(graph.distancesFrom(root)),
           isDescended_(distances_.size(), false)
     {
@@ -56,25 +57,66 @@ private:
         return shown;
     }
 
+    // Returns whether the linked objects are at least two and the same is below each of them.
+    bool isSameBelow(Index object, const std::vector<const Link*>& links) const
+    {
+        if (links.size() < 2)
+            return false;
+        const std::vector<const Link*> first = shownLinks(links.front()->target);
+        return !first.empty() && std::all_of(links.begin(), links.end(), [&](const Link* link) {
+            const std::vector<const Link*> below = shownLinks(link->target);
+            return link->role == links.front()->role && !isDescended_[link->target] &&
+                   distances_[link->target] > distances_[object] &&
+                   std::equal(below.begin(), below.end(), first.begin(), first.end(),
+                       [](const Link* one, const Link* other) { return *one == *other; });
+        });
+    }
+
     // The recursion ends despite cycles, since each step increases the distance from the root.
     void writeBelow(Index object, const std::string& indent)
     {
         isDescended_[object] = true;
         const std::vector<const Link*> links = shownLinks(object);
+        const bool isFolded = isSameBelow(object, links);
         for (std::size_t i = 0; i < links.size(); ++i) {
-            const Branch& branch = branchOf(i + 1 == links.size());
-            writeLink(object, *links[i], indent + branch.object, indent + branch.below);
+            const Branch& branch = branchOf(i + 1 == links.size() && !isFolded);
+            if (isFolded)
+                writeLine(indent + branch.object, nameOf(*links[i]), remarkOf(*links[i]));
+            else
+                writeLink(object, *links[i], indent + branch.object, indent + branch.below);
+        }
+        if (isFolded)
+            writeFolded(links, indent);
+    }
+
+    // Writes what is below each of the linked objects once.
+    void writeFolded(const std::vector<const Link*>& links, const std::string& indent)
+    {
+        for (const Link* const link : links)
+            isDescended_[link->target] = true;
+        const Index first = links.front()->target;
+        const std::vector<const Link*> below = shownLinks(first);
+        for (std::size_t i = 0; i < below.size(); ++i) {
+            const Branch& branch = branchOf(i + 1 == below.size());
+            writeLink(first, *below[i], indent + branch.object, indent + branch.below,
+                "each " + links.front()->role + ": ");
         }
     }
 
-    void writeLink(
-        Index object, const Link& link, const std::string& before, const std::string& indentBelow)
+    std::string nameOf(const Link& link) const
+    {
+        return link.role + " " + shortName(graph_.path(link.target));
+    }
+
+    static std::string remarkOf(const Link& link) { return " (" + link.associationClass + ")"; }
+
+    void writeLink(Index object, const Link& link, const std::string& before,
+        const std::string& indentBelow, const std::string& whose = "")
     {
         const bool leadsAway = distances_[link.target] > distances_[object];
         const bool isRepeated = isDescended_[link.target];
         const bool hidesSome = (isRepeated || !leadsAway) && !shownLinks(link.target).empty();
-        writeLine(before, link.role + " " + shortName(graph_.path(link.target)),
-            " (" + link.associationClass + ")" + (hidesSome ? " ..." : ""));
+        writeLine(before + whose, nameOf(link), remarkOf(link) + (hidesSome ? " ..." : ""));
         if (leadsAway && !isRepeated)
             writeBelow(link.target, indentBelow);
     }
@@ -89,22 +131,22 @@ private:
     // Shortens the remark first when the line is too long.
     void writeLine(const std::string& before, const std::string& object, const std::string& remark)
     {
-        const std::string text = before + printable(object);
+        const std::string text = before + printable(object, style_.isUtf8);
         const std::string shown = fitting(text, style_.width);
         const std::size_t used = displayWidth(shown);
         const std::size_t room = style_.width > used ? style_.width - used : 0;
-        const std::string rest = room == 0 ? "" : fitting(printable(remark), room);
+        const std::string rest = room == 0 ? "" : fitting(printable(remark, style_.isUtf8), room);
         out_.write(shown + emphasized(rest, Emphasis::faint, style_.isColored) + "\n");
     }
 
-    static std::string fitting(const std::string& text, std::size_t width)
+    std::string fitting(const std::string& text, std::size_t width) const
     {
-        return displayWidth(text) <= width ? text : cutToWidth(text, width);
+        return displayWidth(text) <= width ? text : cutToWidth(text, width, style_.isUtf8);
     }
 
     Output& out_;
     const AssociationGraph& graph_;
-    const TreeStyle& style_;
+    const TextStyle& style_;
     std::vector<std::size_t> distances_;
     std::vector<bool> isDescended_;
 };
@@ -112,7 +154,7 @@ private:
 } // namespace
 
 void writeTree(Output& out, const AssociationGraph& graph, AssociationGraph::Index root,
-    const TreeStyle& style)
+    const TextStyle& style)
 {
     TreeWriter(out, graph, root, style);
 }

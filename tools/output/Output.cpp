@@ -2,6 +2,7 @@
 
 #include "tools/output/Output.h"
 
+#include "tools/output/Terminal.h"
 #include "tools/output/Utf8.h"
 
 #include <fcntl.h>
@@ -59,10 +60,13 @@ void Output::flush()
     pending_.clear();
 }
 
-void complain(std::string_view text) noexcept
+void complain(std::string_view text, const std::vector<std::string>& lines) noexcept
 {
     try {
-        writeAll(STDERR_FILENO, "sensorctl: " + printable(text) + "\n");
+        std::string message = "sensorctl: " + printable(text, isUtf8Locale()) + "\n";
+        for (const std::string& line : lines)
+            message += "  " + printable(line, isUtf8Locale()) + "\n";
+        writeAll(STDERR_FILENO, message);
     } catch (const std::exception&) {
         // There is nowhere left to report it.
     }

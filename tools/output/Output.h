@@ -6,6 +6,7 @@
 
 #include <string>
 #include <string_view>
+#include <vector>
 
 namespace Tools {
 
@@ -33,8 +34,8 @@ private:
     std::string pending_;
 };
 
-// Writes `sensorctl: <text>` as one line to standard error, with unprintable characters escaped.
-// Ignores failures.
-void complain(std::string_view text) noexcept;
+// Writes `sensorctl: <text>` and the further lines, which are indented, to standard error, with
+// unprintable characters escaped. Ignores failures.
+void complain(std::string_view text, const std::vector<std::string>& lines = {}) noexcept;
 
 } // namespace Tools

@@ -8,9 +8,9 @@
 #include "host/broker/String.h"
 #include "host/broker/Text.h"
 #include "tools/cim/ObjectNames.h"
-#include "tools/cim/SensorView.h"
 #include "tools/cim/ValueMaps.h"
 #include "tools/output/Emphasis.h"
+#include "tools/output/SensorCells.h"
 #include "tools/output/Utf8.h"
 
 #include <algorithm>
@@ -23,47 +23,39 @@ namespace {
 
 constexpr std::size_t margin = 2;
 
-std::string withUnit(const std::string& number, std::string_view unit)
-{
-    return unit.empty() ? number : number + " " + std::string(unit);
-}
-
 // Returns the meaning of a number; an empty text when it has none.
-std::string meaningIn(const SensorView& sensor, std::string_view property, const Host::Value& value)
+std::string meaningIn(const Sensor& sensor, std::string_view property, const Host::Value& value)
 {
-    if (property == "CurrentReading") {
-        const auto reading = sensor.reading();
-        return reading ? withUnit(*reading, sensor.unit()) : "no reading";
-    }
-    if (property.find("Threshold") != std::string_view::npos && value.signedInteger()) {
-        const auto limit = sensor.limit(property);
-        return limit ? withUnit(*limit, sensor.unit()) : "out of range";
-    }
+    if (property == "CurrentReading")
+        return sensor.reading ? textWithUnit(sensor.reading, sensor) : "no reading";
+    for (std::size_t i = 0; i < limitKinds.size(); ++i)
+        if (const auto& limit = sensor.limits.at(i); property == limitKinds.at(i).property)
+            return limit ? textWithUnit(limit, sensor) : "out of range";
     const auto code = value.unsignedInteger();
     return code ? std::string(meaningOf(property, *code)) : std::string{};
 }
 
-std::string shown(const SensorView& sensor, std::string_view property, const Host::Value& value)
+std::string shown(const Sensor& sensor, std::string_view property, const Host::Value& value)
 {
     if (const auto text = value.text())
-        return printable(*text);
+        return std::string(*text);
     if (const Host::ObjectPath* const path = value.path())
-        return printable(path->toText());
+        return path->toText();
     const std::string meaning = meaningIn(sensor, property, value);
-    const std::string number = printable(Host::toText(value));
+    const std::string number = Host::toText(value);
     return meaning.empty() ? number : number + " (" + meaning + ")";
 }
 
 // Returns one item, or an item for each element of an array.
 std::vector<std::string> itemsOf(
-    const SensorView& sensor, std::string_view property, const Host::Value& value)
+    const Sensor& sensor, std::string_view property, const Host::Value& value, bool isUtf8)
 {
     const Host::Array* const array = value.array();
     if (array == nullptr)
-        return {shown(sensor, property, value)};
+        return {printable(shown(sensor, property, value), isUtf8)};
     std::vector<std::string> items;
     for (const Host::Value& element : array->elements())
-        items.push_back(shown(sensor, property, element));
+        items.push_back(printable(shown(sensor, property, element), isUtf8));
     return items;
 }
 
@@ -91,21 +83,21 @@ std::string flow(const std::vector<std::string>& items, std::size_t column, std:
 
 } // namespace
 
-std::string propertyList(const Host::Instance& instance, std::size_t width, bool isColored)
+std::string propertyList(const Host::Instance& instance, const TextStyle& style)
 {
     std::size_t column = 0;
     for (const Host::NamedValue& property : instance.properties())
         column = std::max(column, property.name->text()->size());
     column += 2 * margin;
 
-    const SensorView sensor(instance);
-    std::string text = emphasized(printable(nameOf(instance)), Emphasis::heading, isColored) + "\n";
+    const Sensor sensor(instance);
+    std::string text = emphasized(printable(nameOf(instance), style.isUtf8), Emphasis::heading, style.isColored) + "\n";
     for (const Host::NamedValue& property : instance.properties()) {
         if (property.value.isNull())
             continue;
         const std::string_view name = *property.name->text();
         text.append(margin, ' ').append(name).append(column - margin - name.size(), ' ');
-        text += flow(itemsOf(sensor, name, property.value), column, width) + "\n";
+        text += flow(itemsOf(sensor, name, property.value, style.isUtf8), column, style.width) + "\n";
     }
     return text;
 }

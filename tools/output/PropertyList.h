@@ -4,7 +4,8 @@
 
 #pragma once
 
-#include <cstddef>
+#include "tools/output/TextStyle.h"
+
 #include <string>
 
 namespace Host {
@@ -15,6 +16,6 @@ namespace Tools {
 
 // Returns the object's name, then a line for each property in the order of the instance, with the
 // meanings of codes and scaled numbers. The elements of an array are wrapped at the width.
-std::string propertyList(const Host::Instance& instance, std::size_t width, bool isColored);
+std::string propertyList(const Host::Instance& instance, const TextStyle& style);
 
 } // namespace Tools

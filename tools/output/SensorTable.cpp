@@ -2,88 +2,131 @@
 
 #include "tools/output/SensorTable.h"
 
-#include "tools/cim/SensorView.h"
-#include "tools/output/Table.h"
+#include "tools/output/SensorCells.h"
+#include "tools/output/Terminal.h"
 #include "tools/output/Utf8.h"
 
-#include <array>
+#include <algorithm>
+#include <bitset>
 
 namespace Tools {
 
 namespace {
 
-using LimitProperties = std::array<const char*, 3>;
+// The least width of names for which columns of limits are left out.
+constexpr std::size_t leastName = 16;
 
-constexpr LimitProperties lowerLimits = {
-    "LowerThresholdNonCritical", "LowerThresholdCritical", "LowerThresholdFatal"};
-constexpr LimitProperties upperLimits = {
-    "UpperThresholdNonCritical", "UpperThresholdCritical", "UpperThresholdFatal"};
+// Which columns a table has beside name, reading and state.
+enum class Layout { everything, limitColumns, limitPairs, noLimits };
 
-// Returns the limits by increasing severity, such as "80/95" or "-/95", up to the last one that the
-// sensor has.
-std::string limitsOf(const SensorView& sensor, const LimitProperties& properties)
+using LimitSet = std::bitset<limitKinds.size()>;
+
+LimitSet limitsOfAny(const Sensors& sensors)
+{
+    LimitSet set;
+    for (const Sensor& sensor : sensors)
+        for (std::size_t i = 0; i < set.size(); ++i)
+            set[i] = set[i] || sensor.limits.at(i);
+    return set;
+}
+
+// Returns the title of the column with the limits of one end, such as "HIGH/CRIT".
+std::string pairTitle(std::size_t first, const LimitSet& set)
+{
+    return std::string(limitKinds.at(first).title) + "/CRIT" + (set[first + 2] ? "/FATAL" : "");
+}
+
+// Returns the limits of one end by increasing severity, such as "80/95" or "-/95", up to the last
+// one that the sensor has.
+std::string pairText(const Sensor& sensor, std::size_t first)
 {
     std::string text;
     std::string skipped;
-    for (const char* const property : properties) {
-        const auto limit = sensor.roundedLimit(property);
+    for (std::size_t i = first; i < first + firstUpperLimit; ++i) {
+        const auto& limit = sensor.limits.at(i);
         if (limit)
-            text += skipped + *limit;
+            text += skipped + limitText(limit);
         skipped = (limit ? "" : skipped + absent) + "/";
     }
     return text.empty() ? absent : text;
 }
 
-Cell healthOf(const SensorView& sensor)
-{
-    switch (sensor.health()) {
-    case Health::ok:
-        return {"OK", Emphasis::good};
-    case Health::warning:
-        return {"Warning", Emphasis::warning};
-    case Health::critical:
-        return {"Critical", Emphasis::critical};
-    case Health::unknown:
-        break;
+class SensorTableBuilder {
+public:
+    SensorTableBuilder(const Sensors& sensors, Grouping grouping, const TextStyle& style)
+        : sensors_(sensors), isGrouped_(grouping == Grouping::byChip), style_(style),
+          limits_(limitsOfAny(sensors))
+    {
     }
-    return {"Unknown", Emphasis::none};
-}
 
-Cell stateOf(const SensorView& sensor)
-{
-    const std::string state = printable(sensor.state());
-    const Health health = sensor.health();
-    if (health == Health::critical)
-        return {state, Emphasis::critical};
-    if (health == Health::warning)
-        return {state, Emphasis::warning};
-    return {state.empty() ? absent : state, Emphasis::none};
-}
+    Table build(Layout layout) const
+    {
+        Table table(columns(layout));
+        const std::string* chip = nullptr;
+        for (const Sensor& sensor : sensors_) {
+            if (isGrouped_ && (chip == nullptr || *chip != sensor.chip))
+                table.addHeading(chipHeading(sensor, style_));
+            chip = &sensor.chip;
+            table.add(cells(sensor, layout));
+        }
+        return table;
+    }
 
-Cell readingOf(const SensorView& sensor)
-{
-    const auto reading = sensor.reading();
-    return reading ? Cell{*reading} : Cell{absent, Emphasis::faint};
-}
+private:
+    std::vector<Column> columns(Layout layout) const
+    {
+        using enum Column::Alignment;
+        std::vector<Column> columns = {{isGrouped_ ? "  NAME" : "NAME"}};
+        if (!isGrouped_)
+            columns.push_back({"CHIP"});
+        columns.insert(columns.end(), {{"READING", right}, {"", left, 1}, {"STATE"}});
+        if (layout == Layout::limitPairs)
+            columns.insert(columns.end(),
+                {{pairTitle(0, limits_)}, {pairTitle(firstUpperLimit, limits_)}});
+        for (std::size_t i = 0; i < limits_.size() && layout < Layout::limitPairs; ++i)
+            if (limits_[i])
+                columns.push_back({limitKinds.at(i).title, right});
+        if (layout == Layout::everything)
+            columns.push_back({"DEVICE ID"});
+        return columns;
+    }
 
-Cell unitOf(const SensorView& sensor)
-{
-    return {sensor.reading() ? std::string(sensor.unit()) : ""};
-}
+    std::vector<Cell> cells(const Sensor& sensor, Layout layout) const
+    {
+        std::vector<Cell> cells = {{(isGrouped_ ? "  " : "") + shown(sensor.label)}};
+        if (!isGrouped_)
+            cells.push_back({shown(sensor.chip)});
+        cells.insert(cells.end(),
+            {readingCell(sensor), unitCell(sensor, style_), stateCell(sensor)});
+        if (layout == Layout::limitPairs)
+            cells.insert(
+                cells.end(), {{pairText(sensor, 0)}, {pairText(sensor, firstUpperLimit)}});
+        for (std::size_t i = 0; i < limits_.size() && layout < Layout::limitPairs; ++i)
+            if (limits_[i])
+                cells.push_back({limitText(sensor.limits.at(i))});
+        if (layout == Layout::everything)
+            cells.push_back({shown(sensor.deviceId), Emphasis::faint});
+        return cells;
+    }
+
+    std::string shown(const std::string& text) const { return printable(text, style_.isUtf8); }
+
+    const Sensors& sensors_;
+    bool isGrouped_;
+    const TextStyle& style_;
+    LimitSet limits_;
+};
 
 } // namespace
 
-std::string sensorTable(
-    const std::vector<const Host::Instance*>& sensors, std::size_t width, bool isColored)
+std::string sensorTable(const Sensors& sensors, Grouping grouping, const TextStyle& style)
 {
-    Table table({{"NAME"}, {"READING", Column::Alignment::right}, {"", Column::Alignment::left, 1},
-        {"STATE"}, {"HEALTH"}, {"LOWER"}, {"UPPER"}});
-    for (const Host::Instance* const instance : sensors) {
-        const SensorView sensor(*instance);
-        table.add({{printable(sensor.name())}, readingOf(sensor), unitOf(sensor), stateOf(sensor),
-            healthOf(sensor), {limitsOf(sensor, lowerLimits)}, {limitsOf(sensor, upperLimits)}});
-    }
-    return table.toText(width, isColored);
+    const SensorTableBuilder builder(sensors, grouping, style);
+    for (const auto& [layout, name] : {std::pair(Layout::everything, unlimited),
+             {Layout::limitColumns, unlimited}, {Layout::limitPairs, leastName}})
+        if (const Table table = builder.build(layout); table.width(name) <= style.width)
+            return table.toText(style);
+    return builder.build(Layout::noLimits).toText(style);
 }
 
 } // namespace Tools

@@ -1,22 +1,21 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// A table of sensors.
+// Tables of sensors.
 
 #pragma once
 
-#include <cstddef>
-#include <string>
-#include <vector>
+#include "tools/output/TextStyle.h"
+#include "tools/sensors/SensorList.h"
 
-namespace Host {
-class Instance;
-}
+#include <string>
 
 namespace Tools {
 
-// Returns a table with name, reading, unit, state, health and limits of each sensor, in the given
-// order.
-std::string sensorTable(
-    const std::vector<const Host::Instance*>& sensors, std::size_t width, bool isColored);
+enum class Grouping { byChip, none };
+
+// Returns a table with label, reading, state and limits of each sensor: below a line for each chip,
+// or with the chip in each line. The fewer columns of a terminal there are, the fewer columns the
+// table has; only the widest has the identifiers.
+std::string sensorTable(const Sensors& sensors, Grouping grouping, const TextStyle& style);
 
 } // namespace Tools

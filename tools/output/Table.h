@@ -5,6 +5,7 @@
 #pragma once
 
 #include "tools/output/Emphasis.h"
+#include "tools/output/TextStyle.h"
 
 #include <cstddef>
 #include <string>
@@ -21,6 +22,9 @@ struct Cell {
     Emphasis emphasis = Emphasis::none;
 };
 
+// The cells of a line with their padding.
+using Line = std::vector<Cell>;
+
 struct Column {
     enum class Alignment { left, right };
 
@@ -34,19 +38,38 @@ public:
     explicit Table(std::vector<Column> columns) : columns_(std::move(columns)) {}
 
     // REQUIRES: as many cells as there are columns.
-    void add(std::vector<Cell> cells) { rows_.push_back(std::move(cells)); }
+    void add(std::vector<Cell> cells) { rows_.push_back({std::move(cells), false}); }
+    // Adds a line whose cells ignore the columns.
+    void addHeading(std::vector<Cell> cells) { rows_.push_back({std::move(cells), true}); }
 
-    // Returns a line of titles and the rows, each with a line feed and without trailing blanks.
-    // Shortens the first column, down to a few characters, to keep lines within the width.
-    std::string toText(std::size_t width, bool isColored) const;
+    // Returns the width of the lines whose first column has that minimal width at most.
+    std::size_t width(std::size_t minimumOfFirst) const;
+
+    // Returns a line of titles and the rows, without trailing blanks. Shortens the first column,
+    // down to a few characters, and headings to keep lines within the width.
+    std::vector<Line> lines(const TextStyle& style) const;
+
+    // Returns the lines, each with a line feed.
+    std::string toText(const TextStyle& style) const;
 
 private:
-    std::vector<std::size_t> columnWidths(std::size_t width) const;
-    void appendLine(std::string& text, const std::vector<Cell>& cells,
-        const std::vector<std::size_t>& widths, bool isColored) const;
+    struct Row {
+        std::vector<Cell> cells;
+        bool isHeading;
+    };
+
+    std::vector<std::size_t> columnWidths() const;
+    Line lineOf(const std::vector<Cell>& cells, const std::vector<std::size_t>& widths,
+        const TextStyle& style) const;
 
     std::vector<Column> columns_;
-    std::vector<std::vector<Cell>> rows_;
+    std::vector<Row> rows_;
 };
+
+// Returns the line as text, with a line feed.
+std::string textOf(const Line& line, const TextStyle& style);
+
+// Returns the beginning of the line that fits the width.
+Line cutLine(const Line& line, const TextStyle& style);
 
 } // namespace Tools

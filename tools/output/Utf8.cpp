@@ -4,6 +4,7 @@
 
 #include "platform/text/Utf8.h"
 
+#include <algorithm>
 #include <array>
 #include <cstdio>
 
@@ -11,7 +12,18 @@ namespace Tools {
 
 namespace {
 
-constexpr std::string_view ellipsis = "\xE2\x80\xA6"; // one column wide
+// Both are one column wide.
+constexpr std::string_view ellipsis = "\xE2\x80\xA6";
+constexpr std::string_view asciiEllipsis = "~";
+
+constexpr char32_t lastOfAscii = 0x7E; // the last printable one
+constexpr char32_t degreeSign = 0xB0;
+
+// Returns whether the text consists of printable ASCII only, as most do.
+bool isPlain(std::string_view text)
+{
+    return std::all_of(text.begin(), text.end(), [](char c) { return c >= ' ' && c <= '~'; });
+}
 
 // Returns the escape of an unprintable character.
 std::string escapeOf(char32_t character)
@@ -46,17 +58,20 @@ bool isUnprintable(char32_t character)
     return isControl || isSeparator || isBidirectional;
 }
 
-std::string printable(std::string_view text)
+std::string printable(std::string_view text, bool isUtf8)
 {
+    if (isPlain(text))
+        return std::string(text);
     std::string result;
     result.reserve(text.size());
     while (!text.empty()) {
         const Text::Character character = Text::firstCharacter(text);
-        if (!character.isValid)
-            Text::appendUtf8(result, Text::replacementCharacter);
-        else if (isUnprintable(character.code))
+        const bool isForeign = !isUtf8 && character.code > lastOfAscii;
+        if (isUnprintable(character.code) || (isForeign && character.code != degreeSign))
             result += escapeOf(character.code);
-        else
+        else if (!character.isValid)
+            Text::appendUtf8(result, Text::replacementCharacter);
+        else if (!isForeign)
             result += text.substr(0, character.size);
         text.remove_prefix(character.size);
     }
@@ -65,6 +80,8 @@ std::string printable(std::string_view text)
 
 std::size_t displayWidth(std::string_view text)
 {
+    if (isPlain(text))
+        return text.size();
     std::size_t width = 0;
     while (!text.empty()) {
         const Text::Character character = Text::firstCharacter(text);
@@ -74,7 +91,7 @@ std::size_t displayWidth(std::string_view text)
     return width;
 }
 
-std::string cutToWidth(std::string_view text, std::size_t width)
+std::string cutToWidth(std::string_view text, std::size_t width, bool isUtf8)
 {
     if (displayWidth(text) <= width)
         return std::string(text);
@@ -87,7 +104,7 @@ std::string cutToWidth(std::string_view text, std::size_t width)
             break;
         fits += character.size;
     }
-    return std::string(text.substr(0, fits)).append(ellipsis);
+    return std::string(text.substr(0, fits)).append(isUtf8 ? ellipsis : asciiEllipsis);
 }
 
 } // namespace Tools

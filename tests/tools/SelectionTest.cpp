@@ -1,0 +1,94 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// The selectors and filters of `list`.
+
+#include "tests/tools/ToolTest.h"
+
+#include <gmock/gmock.h>
+
+namespace {
+
+using testing::ElementsAre;
+using testing::HasSubstr;
+using namespace Testing;
+
+class SelectionTest : public ToolTest {
+protected:
+    Ended listed(std::vector<std::string> more) const
+    {
+        more.insert(more.begin(), {"list", "--json", "--model", smallModel()});
+        return run(more);
+    }
+
+    std::vector<std::string> idsOf(const std::vector<std::string>& more) const
+    {
+        std::vector<std::string> ids;
+        for (const auto& sensor : nlohmann::json::parse(listed(more).out))
+            ids.push_back(sensor.at("deviceId"));
+        return ids;
+    }
+};
+
+TEST_F(SelectionTest, SelectorsAreNamesAndPatternsInAnyCase)
+{
+    for (const char* const selector :
+        {"BOARD", "/board/*", "*:/board/*", "boar?", "[a-b]oard", "board/*"})
+        EXPECT_THAT(
+            idsOf({selector}), ElementsAre("+12V:/board/in1", "Fan:/board/fan1", "Fan:/board/fan2"))
+            << selector;
+    EXPECT_THAT(idsOf({"fan"}), ElementsAre("Fan:/board/fan1", "Fan:/board/fan2"));
+    EXPECT_THAT(idsOf({"fan2"}), ElementsAre("Fan:/board/fan2"));
+}
+
+TEST_F(SelectionTest, SeveralSelectorsAddUp)
+{
+    EXPECT_THAT(idsOf({"cpu 1", "CPU*", "in1"}),
+        ElementsAre("+12V:/board/in1", "CPU 1:/cpu0/temp1", "CPU 2:/cpu1/temp1"));
+}
+
+TEST_F(SelectionTest, KindsAndProblemsNarrowTheSelection)
+{
+    EXPECT_THAT(idsOf({"--kind", "Fan"}), ElementsAre("Fan:/board/fan1", "Fan:/board/fan2"));
+    EXPECT_THAT(idsOf({"--kind", "voltage", "--kind", "temperature", "board"}),
+        ElementsAre("+12V:/board/in1"));
+    EXPECT_THAT(idsOf({"--problems"}),
+        ElementsAre("+12V:/board/in1", "Fan:/board/fan2", "CPU 2:/cpu1/temp1"));
+    EXPECT_THAT(idsOf({"--problems", "fan"}), ElementsAre("Fan:/board/fan2"));
+}
+
+TEST_F(SelectionTest, NameWithMarksOfAPatternMatchesItself)
+{
+    const std::string file =
+        model(R"({ "type": "voltage", "path": "/a", "description": "in[0]", "status": 1 })");
+    EXPECT_EQ(run({"list", "in[0]", "--model", file}).code, 0);
+    EXPECT_EQ(run({"list", "in0", "--model", file}).code, 3);
+}
+
+TEST_F(SelectionTest, EachSelectorThatNothingMatchesIsSaid)
+{
+    const Ended ended = listed({"CPU 3", "Fan", "bord"});
+    EXPECT_EQ(ended.code, 3);
+    EXPECT_EQ(nlohmann::json::parse(ended.out).size(), 2U);
+    const auto lines = linesOf(ended.err);
+    ASSERT_EQ(lines.size(), 2U);
+    EXPECT_THAT(lines[0], HasSubstr("no sensor matches \"CPU 3\"; what comes nearest: "));
+    EXPECT_EQ(lines[1], "sensorctl: no sensor matches \"bord\"; what comes nearest: \"board\", "
+                        "\"/board/in1\", \"/board/fan1\"");
+}
+
+TEST_F(SelectionTest, NothingLeftIsSaidAndEndsWithThree)
+{
+    const Ended healthy = listed({"cpu0", "--problems"});
+    EXPECT_EQ(healthy.code, 3);
+    EXPECT_EQ(healthy.out, "[]\n");
+    EXPECT_EQ(healthy.err, "sensorctl: none of the sensors has a problem\n");
+    EXPECT_EQ(listed({"cpu0", "--kind", "fan"}).err, "sensorctl: no sensor is of that kind\n");
+}
+
+TEST_F(SelectionTest, SummaryCountsWhatIsShown)
+{
+    const Ended ended = run({"list", "fan", "--model", smallModel()});
+    EXPECT_EQ(linesOf(ended.out).back(), "2 sensors: 1 normal, 1 lost.");
+}
+
+} // namespace

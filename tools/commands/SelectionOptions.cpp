@@ -1,0 +1,59 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "tools/commands/SelectionOptions.h"
+
+#include "tools/sensors/Selector.h"
+
+#include <CLI/CLI.hpp>
+
+#include <algorithm>
+#include <set>
+
+namespace Tools {
+
+void SelectionOptions::addTo(CLI::App& parser)
+{
+    parser
+        .add_option(
+            "SELECTOR", selectors_, "Chip, label, path or DeviceID of sensors, or a pattern")
+        ->type_name("");
+    const std::set<std::string> choices(sensorKinds.begin(), sensorKinds.end());
+    parser.add_option("--kind", kinds_, "Only this kind: temperature, voltage or fan")
+        ->type_name("KIND")
+        ->allow_extra_args(false)
+        ->transform(CLI::IsMember(choices, CLI::ignore_case).description(""));
+}
+
+void SelectionOptions::addProblems(CLI::App& parser)
+{
+    parser.add_flag("--problems", onlyProblems_, "Only sensors that warn, are critical or lost");
+}
+
+bool SelectionOptions::isSelected(const Sensor& sensor) const
+{
+    const auto isKind = [&](const std::string& kind) { return kind == sensor.kind; };
+    const auto isMatch = [&](const std::string& each) { return selects(each, sensor); };
+    return (kinds_.empty() || std::any_of(kinds_.begin(), kinds_.end(), isKind)) &&
+           (selectors_.empty() || std::any_of(selectors_.begin(), selectors_.end(), isMatch));
+}
+
+SelectionOptions::Selected SelectionOptions::select(const Sensors& all) const
+{
+    Selected selected;
+    for (const std::string& selector : selectors_)
+        if (std::none_of(all.begin(), all.end(),
+                [&](const Sensor& sensor) { return selects(selector, sensor); }))
+            selected.complaints.push_back(nothingMatches(selector, all));
+    std::copy_if(all.begin(), all.end(), std::back_inserter(selected.sensors),
+        [&](const Sensor& sensor) { return isSelected(sensor); });
+    const bool isOfSomeKind = !selected.sensors.empty();
+    if (onlyProblems_)
+        std::erase_if(selected.sensors,
+            [](const Sensor& sensor) { return !isProblem(sensor.state.severity); });
+    if (selected.sensors.empty() && selected.complaints.empty())
+        selected.complaints.emplace_back(
+            isOfSomeKind ? "none of the sensors has a problem" : "no sensor is of that kind");
+    return selected;
+}
+
+} // namespace Tools

@@ -1,0 +1,44 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// The options that select sensors.
+
+#pragma once
+
+#include "tools/sensors/SensorList.h"
+
+#include <string>
+#include <vector>
+
+namespace CLI {
+class App;
+}
+
+namespace Tools {
+
+// The object must outlive the parser.
+class SelectionOptions {
+public:
+    // Adds SELECTOR... and --kind.
+    void addTo(CLI::App& parser);
+    // Adds --problems.
+    void addProblems(CLI::App& parser);
+
+    const std::vector<std::string>& selectors() const { return selectors_; }
+    bool isGiven() const { return !selectors_.empty() || !kinds_.empty() || onlyProblems_; }
+
+    struct Selected {
+        Sensors sensors;
+        std::vector<std::string> complaints; // a sentence for each criterion that nothing meets
+    };
+    Selected select(const Sensors& all) const;
+
+    // Returns whether the selectors and the kind select the sensor, whatever its state.
+    bool isSelected(const Sensor& sensor) const;
+
+private:
+    std::vector<std::string> selectors_;
+    std::vector<std::string> kinds_;
+    bool onlyProblems_ = false;
+};
+
+} // namespace Tools

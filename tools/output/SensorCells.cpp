@@ -1,0 +1,62 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "tools/output/SensorCells.h"
+
+#include "tools/cim/Units.h"
+#include "tools/output/Utf8.h"
+
+namespace Tools {
+
+Emphasis emphasisOf(Severity severity)
+{
+    switch (severity) {
+    case Severity::normal:
+        return Emphasis::good;
+    case Severity::warning:
+    case Severity::lost:
+        return Emphasis::warning;
+    case Severity::critical:
+        return Emphasis::critical;
+    case Severity::inactive:
+    case Severity::unknown:
+        break;
+    }
+    return Emphasis::none;
+}
+
+Cell stateCell(const Sensor& sensor)
+{
+    return {std::string(sensor.state.word), emphasisOf(sensor.state.severity)};
+}
+
+Cell readingCell(const Sensor& sensor)
+{
+    return sensor.reading ? Cell{sensor.reading->rounded()} : Cell{absent, Emphasis::faint};
+}
+
+Cell unitCell(const Sensor& sensor, const TextStyle& style)
+{
+    return {sensor.reading ? printable(sensor.unit, style.isUtf8) : ""};
+}
+
+Line chipHeading(const Sensor& sensor, const TextStyle& style)
+{
+    Line line = {{printable(sensor.chip, style.isUtf8), Emphasis::heading}};
+    if (!sensor.device.empty())
+        line.push_back({"   (" + printable(sensor.device, style.isUtf8) + ")", Emphasis::faint});
+    return line;
+}
+
+std::string limitText(const std::optional<Quantity>& limit)
+{
+    return limit ? withoutTrailingZeros(limit->rounded()) : absent;
+}
+
+std::string textWithUnit(const std::optional<Quantity>& quantity, const Sensor& sensor)
+{
+    if (!quantity)
+        return absent;
+    return quantity->text() + (sensor.unit.empty() ? "" : " " + std::string(sensor.unit));
+}
+
+} // namespace Tools

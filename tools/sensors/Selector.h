@@ -1,0 +1,22 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// Sensors by the names that users give.
+
+#pragma once
+
+#include "tools/sensors/SensorList.h"
+
+#include <string>
+#include <vector>
+
+namespace Tools {
+
+// Returns whether the selector is the chip, the label, the feature, the path or the DeviceID of the
+// sensor, or chip and label or feature with a slash between them, in any letter case; or a pattern
+// of fnmatch(3) that one of them matches.
+bool selects(const std::string& selector, const Sensor& sensor);
+
+// Returns a sentence that no sensor matches the selector, with up to three names that are nearest.
+std::string nothingMatches(const std::string& selector, const Sensors& sensors);
+
+} // namespace Tools

@@ -1,0 +1,81 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// A sensor as people see it.
+
+#pragma once
+
+#include "tools/sensors/SensorState.h"
+
+#include <array>
+#include <cstddef>
+#include <cstdint>
+#include <optional>
+#include <string>
+#include <string_view>
+
+namespace Host {
+class Instance;
+}
+
+namespace Tools {
+
+// A reading or a limit: `value` times ten to the power of `modifier`. Readings and limits of a
+// sensor have the same modifier and are rounded alike, so that no reading at a limit is shown below
+// it.
+struct Quantity {
+    std::int64_t value;
+    std::int32_t modifier;
+
+    double number() const;
+    std::string text() const;    // in full, such as "12.096"
+    std::string rounded() const; // to hundredths unless it is less than 1, such as "12.10"
+};
+
+struct LimitKind {
+    const char* property; // of ZUMLO_NumericSensor
+    const char* member;   // of a JSON document
+    const char* title;    // of a column
+    const char* words;
+};
+
+inline constexpr std::array<LimitKind, 6> limitKinds = {{
+    {"LowerThresholdNonCritical", "lowWarning", "LOW", "Low warning"},
+    {"LowerThresholdCritical", "lowCritical", "LOW CRIT", "Low critical"},
+    {"LowerThresholdFatal", "lowFatal", "LOW FATAL", "Low fatal"},
+    {"UpperThresholdNonCritical", "highWarning", "HIGH", "High warning"},
+    {"UpperThresholdCritical", "highCritical", "HIGH CRIT", "High critical"},
+    {"UpperThresholdFatal", "highFatal", "HIGH FATAL", "High fatal"},
+}};
+inline constexpr std::size_t firstUpperLimit = 3;
+
+// Texts are as the provider spells them: not yet printable.
+struct Sensor {
+    Sensor() = default;
+    // Interprets an instance of ZUMLO_NumericSensor.
+    explicit Sensor(const Host::Instance& instance);
+
+    // Sets the identifier by what it consists of: label and path.
+    void setNames(std::string_view itsLabel, std::string_view itsPath);
+
+    std::string label;
+    std::string path;    // such as "/hwmon/coretemp-isa-0000/temp1"
+    std::string chip;    // the folder of the path, without "/hwmon/"
+    std::string feature; // the rest of the path
+    std::string deviceId;
+    std::string device;         // what the chip belongs to, such as a disk's model; often empty
+    std::string_view kind = ""; // one of sensorKinds, or empty
+    std::string_view unit;      // empty when unknown
+
+    // Nothing when the sensor has none: when CurrentReading is missing or out of range, when
+    // communication is lost (OperationalStatus 13), and when CurrentReading is 0 and the sensor is
+    // out of contact (OperationalStatus 12), disabled or offline (EnabledState 3 or 6).
+    std::optional<Quantity> reading;
+    std::array<std::optional<Quantity>, limitKinds.size()> limits; // in the order of limitKinds
+
+    SensorState state;
+    const Host::Instance* instance = nullptr; // null when made of no instance
+};
+
+inline constexpr std::array<const char*, 3> sensorKinds = {"temperature", "voltage", "fan"};
+
+} // namespace Tools

@@ -1,0 +1,87 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "tools/sensors/SensorList.h"
+
+#include "platform/instrumentation/machinefile/MachineFileSource.h"
+#include "tools/cim/ProviderClient.h"
+#include "tools/sensors/NaturalOrder.h"
+
+#include <algorithm>
+#include <map>
+
+namespace Tools {
+
+namespace {
+
+bool isListedBefore(const Sensor& first, const Sensor& second)
+{
+    for (const auto& [left, right] : {std::pair(&first.chip, &second.chip),
+             {&first.label, &second.label}, {&first.path, &second.path}}) {
+        if (isBefore(*left, *right))
+            return true;
+        if (isBefore(*right, *left))
+            return false;
+    }
+    return false;
+}
+
+std::vector<const char*> propertiesOfSensors()
+{
+    std::vector<const char*> names = {"ElementName", "DeviceID", "SensorType", "BaseUnits",
+        "UnitModifier", "CurrentReading", "CurrentState", "OperationalStatus", "EnabledState"};
+    for (const LimitKind& limit : limitKinds)
+        names.push_back(limit.property);
+    names.push_back(nullptr);
+    return names;
+}
+
+} // namespace
+
+Sensors readSensors(ProviderClient& provider, bool isWhole)
+{
+    std::vector<const char*> properties = propertiesOfSensors();
+    Sensors sensors;
+    for (const Host::Instance* const each :
+        provider.instances(sensorClass, isWhole ? nullptr : properties.data()))
+        sensors.emplace_back(*each);
+    std::stable_sort(sensors.begin(), sensors.end(), isListedBefore);
+    return sensors;
+}
+
+Sensors sensorsInFile(const std::string& file)
+{
+    using Vorn::NodeLexicon::NodeType;
+    Vorn::MachineFileSource source(file);
+    Sensors sensors;
+    for (const auto& [type, kind] : {std::pair(NodeType::Temperature, sensorKinds[0]),
+             {NodeType::Voltage, sensorKinds[1]}, {NodeType::Tachometer, sensorKinds[2]}})
+        for (const auto& node : source.nodes(type)) {
+            Sensor& sensor = sensors.emplace_back();
+            sensor.setNames(node.description, node.path);
+            sensor.kind = kind;
+        }
+    std::stable_sort(sensors.begin(), sensors.end(), isListedBefore);
+    return sensors;
+}
+
+std::string summaryOf(const Sensors& sensors)
+{
+    std::map<Severity, std::size_t> counts;
+    for (const Sensor& sensor : sensors)
+        ++counts[sensor.state.severity];
+    std::string text =
+        std::to_string(sensors.size()) + (sensors.size() == 1 ? " sensor" : " sensors");
+    const char* separator = ": ";
+    for (const Severity severity : {Severity::normal, Severity::warning, Severity::critical,
+             Severity::lost, Severity::inactive, Severity::unknown}) {
+        const auto count = counts.find(severity);
+        if (count == counts.end())
+            continue;
+        text.append(separator).append(std::to_string(count->second)).append(" ");
+        text.append(wordOf(severity));
+        separator = ", ";
+    }
+    return text + ".";
+}
+
+} // namespace Tools
