@@ -4,6 +4,8 @@
 
 #pragma once
 
+#include "host/broker/LargeBlocks.h"
+
 #include <cstddef>
 #include <memory>
 #include <memory_resource>
@@ -19,11 +21,7 @@ class String;
 // Used by one thread at a time and without locks.
 class Arena {
 public:
-    // The resource, which must outlive the arena, has the blocks of its memory.
-    explicit Arena(std::pmr::memory_resource& blocks = *std::pmr::get_default_resource())
-        : memory_(firstBlock, &blocks)
-    {
-    }
+    Arena() = default;
     Arena(const Arena&) = delete;
     Arena& operator=(const Arena&) = delete;
 
@@ -73,7 +71,8 @@ private:
 
     Name& findName(std::string_view characters);
 
-    std::pmr::monotonic_buffer_resource memory_;
+    LargeBlocks blocks_;
+    std::pmr::monotonic_buffer_resource memory_{firstBlock, &blocks_};
     std::pmr::unordered_map<std::string_view, Name> names_{&memory_};
     Name* lastName_ = nullptr;
 };

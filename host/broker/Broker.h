@@ -4,7 +4,6 @@
 
 #pragma once
 
-#include "host/broker/BlockCache.h"
 #include "host/broker/Object.h"
 
 namespace Host {
@@ -38,14 +37,11 @@ public:
 
     BrokerUpcalls* upcalls() const noexcept { return upcalls_; }
     const ClassInformation* classInformation() const noexcept { return classes_; }
-    // Returns the memory of the requests, some of which is kept for the next ones.
-    std::pmr::memory_resource& memory() const noexcept { return memory_; }
 
 private:
     CMPIBroker handle_;
     BrokerUpcalls* upcalls_ = nullptr;
     const ClassInformation* classes_ = nullptr;
-    mutable BlockCache memory_;
 };
 
 } // namespace Host

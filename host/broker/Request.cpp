@@ -9,8 +9,7 @@
 namespace Host {
 
 Request::Request(const Broker& broker)
-    : broker_(broker),
-      own_(Arena::current() == nullptr ? std::make_shared<Arena>(broker.memory()) : nullptr),
+    : broker_(broker), own_(Arena::current() == nullptr ? std::make_shared<Arena>() : nullptr),
       arena_(own_ ? *own_ : *Arena::current())
 {
     Arena::makeCurrent(&arena_);
