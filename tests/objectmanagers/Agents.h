@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The processes in which object managers run our providers.
+// Finds the processes in which object managers run our providers.
 
 #pragma once
 

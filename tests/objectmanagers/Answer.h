@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// What an object manager answers to a request of wbemcli, in a form that does not depend on the
+// Asks an object manager with wbemcli, and holds its answer in a form that does not depend on the
 // order in which it returns objects, properties and keys.
 
 #pragma once
@@ -12,7 +12,7 @@
 
 namespace Testing {
 
-// The values by property name, each with its type; no value is NULL.
+// Maps the name of a property to its value with its type; no value is NULL.
 using Properties = std::map<std::string, std::optional<std::string>>;
 
 struct Answer {
@@ -25,7 +25,7 @@ struct Answer {
     bool operator==(const Answer&) const = default;
 };
 
-// Returns it in lines, so that the test framework prints those that differ.
+// Returns the answer in lines, of which the test framework prints those that differ.
 std::string describe(const Answer& answer);
 
 // Sends a request with wbemcli, whose arguments these are, and returns the answer. Throws

@@ -23,10 +23,10 @@ struct Peer {
     Declarations declarations = {};
 };
 
-std::vector<Answer> askAll(const ObjectManager& manager, const std::vector<Request>& requests)
+std::vector<Answer> askAll(const ObjectManager& manager, const std::vector<ClientRequest>& requests)
 {
     std::vector<Answer> answers;
-    for (const Request& request : requests)
+    for (const ClientRequest& request : requests)
         answers.push_back(ask(request.arguments(manager.url(request.object))));
     return answers;
 }
@@ -39,7 +39,7 @@ Declarations declarationsIn(const ObjectManager& manager)
     return declarations;
 }
 
-// All that the tests compare, asked once.
+// Asks all that the tests compare, once.
 class AskedMachine : public ToolTest {
 public:
     AskedMachine()
@@ -58,13 +58,13 @@ public:
             asking.push_back(
                 std::async(std::launch::async, [&] { return askAll(peer.manager, requests); }));
         }
-        for (const Request& request : requests)
+        for (const ClientRequest& request : requests)
             askService(request);
         for (std::size_t i = 0; i < peers.size(); ++i)
             peers[i].answers = asking[i].get();
     }
 
-    const Answer& askService(const Request& request)
+    const Answer& askService(const ClientRequest& request)
     {
         const auto known = serviceAnswers_.find(request);
         if (known != serviceAnswers_.end())
@@ -76,7 +76,7 @@ public:
         return serviceAnswers_.emplace(request, ask(request.arguments(url))).first->second;
     }
 
-    std::vector<Request> requests;
+    std::vector<ClientRequest> requests;
     std::vector<Peer> peers = {{ObjectManager::openPegasus(), differencesOfOpenPegasus()},
         {ObjectManager::sfcb(), differencesOfSfcb()}};
 
@@ -86,7 +86,7 @@ private:
     const std::map<std::string, std::string> settings_ = {
         {"RYNLOG_LOG", "off"}, {"VORN_INSTRUMENTATION", "model:" + smallModel()}};
     ServerProcess service_{{}, settings_};
-    std::map<Request, Answer> serviceAnswers_;
+    std::map<ClientRequest, Answer> serviceAnswers_;
 };
 
 class AnswersTest : public testing::TestWithParam<std::size_t> {
@@ -97,19 +97,19 @@ protected:
     // Returns what the service answers to all that the request is equivalent to by these
     // differences.
     static Equivalent equivalentOf(
-        const Request& request, const std::vector<const Difference*>& differences)
+        const ClientRequest& request, const std::vector<const Difference*>& differences)
     {
         Equivalent equivalent{.requests = {request}};
         for (const Difference* difference : differences) {
             if (difference->equivalentOf == nullptr)
                 continue;
-            std::vector<Request> requests;
-            for (const Request& each : equivalent.requests) {
+            std::vector<ClientRequest> requests;
+            for (const ClientRequest& each : equivalent.requests) {
                 const auto found = difference->equivalentOf(each);
                 if (found && found->error != 0)
                     return *found;
-                const std::vector<Request> same = {each};
-                const std::vector<Request>& more = found ? found->requests : same;
+                const std::vector<ClientRequest> same = {each};
+                const std::vector<ClientRequest>& more = found ? found->requests : same;
                 requests.insert(requests.end(), more.begin(), more.end());
             }
             equivalent.requests = requests;
@@ -118,11 +118,11 @@ protected:
     }
 
     Answer expectedOf(
-        const Request& request, const std::vector<const Difference*>& differences) const
+        const ClientRequest& request, const std::vector<const Difference*>& differences) const
     {
         const Equivalent equivalent = equivalentOf(request, differences);
         Answer answer{.error = equivalent.error};
-        for (const Request& each : equivalent.requests) {
+        for (const ClientRequest& each : equivalent.requests) {
             Answer part = machine_->askService(each);
             for (const Difference* difference : differences)
                 if (difference->change != nullptr)
@@ -162,7 +162,7 @@ TEST_P(AnswersTest, AreThoseOfTheServiceButForTheDifferences)
     RecordProperty("requests", static_cast<int>(machine_->requests.size()));
     int shown = 0;
     for (std::size_t i = 0; i < machine_->requests.size() && shown < 5; ++i) {
-        const Request& request = machine_->requests[i];
+        const ClientRequest& request = machine_->requests[i];
         const Answer expected = expectedOf(request, differencesBut());
         EXPECT_EQ(describe(peer_.answers[i]), describe(expected)) << request;
         shown += peer_.answers[i] == expected ? 0 : 1;

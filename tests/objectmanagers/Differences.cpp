@@ -2,7 +2,7 @@
 
 #include "tests/objectmanagers/Differences.h"
 
-#include "tests/objectmanagers/RequestKinds.h"
+#include "tests/objectmanagers/ClientRequestKinds.h"
 #include "tests/support/Texts.h"
 
 #include <array>
@@ -19,48 +19,48 @@ using Result = std::optional<Equivalent>;
 
 // Returns a request for each association of a sensor: the first one for those of the sensors'
 // provider.
-Equivalent byEachAssociation(Request ours, Request conforming)
+Equivalent byEachAssociation(ClientRequest ours, ClientRequest conforming)
 {
-    Request one = ours;
+    ClientRequest one = ours;
     one.association = systemDevice;
     ours.association = elementCapabilities;
     conforming.association = conformance;
     return {.requests = {one, ours, conforming}};
 }
 
-Result withoutRoles(const Request& request)
+Result withoutRoles(const ClientRequest& request)
 {
     if ((request.role.empty() && request.resultRole.empty()) || isConformance(request))
         return std::nullopt;
-    Request other = request;
+    ClientRequest other = request;
     other.role = other.resultRole = "";
     if (!request.association.empty() || !isFromSensor(request))
         return Equivalent{.requests = {other}};
     return byEachAssociation(other, request);
 }
 
-bool hasKnownResultClass(const Request& request)
+bool hasKnownResultClass(const ClientRequest& request)
 {
     return !request.resultClass.empty() && request.resultClass != "No_Class";
 }
 
-Result askingEach(const Request& request)
+Result askingEach(const ClientRequest& request)
 {
     if (!request.isAssociators() || !request.association.empty() || !hasKnownResultClass(request))
         return std::nullopt;
     return byEachAssociation(request, request);
 }
 
-Result withoutResultClass(const Request& request)
+Result withoutResultClass(const ClientRequest& request)
 {
     if (!isElementCapabilities(request) || !hasKnownResultClass(request))
         return std::nullopt;
-    Request other = request;
+    ClientRequest other = request;
     other.resultClass = "";
     return Equivalent{.requests = {other}};
 }
 
-Result withExactResultClass(const Request& request)
+Result withExactResultClass(const ClientRequest& request)
 {
     if (!isSystemDevice(request) || !hasKnownResultClass(request) ||
         isOneOf(request.resultClass, {"ZUMLO_NumericSensor", "ZUMLO_ComputerSystem"}))
@@ -83,7 +83,7 @@ std::vector<std::string> namesIn(const std::string& list)
     return names;
 }
 
-bool isWanted(const Request& request, const std::string& property)
+bool isWanted(const ClientRequest& request, const std::string& property)
 {
     const std::vector<std::string> names = namesIn(request.properties);
     if (names.empty())
@@ -92,7 +92,7 @@ bool isWanted(const Request& request, const std::string& property)
         [&](const std::string& name) { return isSame(name, property); });
 }
 
-void addUnset(const Request& request, const Declarations& declarations, Answer& answer)
+void addUnset(const ClientRequest& request, const Declarations& declarations, Answer& answer)
 {
     if (request.operation.ends_with('n') || answer.error != 0)
         return;
@@ -111,7 +111,8 @@ void addUnset(const Request& request, const Declarations& declarations, Answer& 
 }
 
 // The sensors' provider compares names as they are written.
-void dropOtherSpellings(const Request& request, const Declarations& declarations, Answer& answer)
+void dropOtherSpellings(
+    const ClientRequest& request, const Declarations& declarations, Answer& answer)
 {
     const std::vector<std::string> names = namesIn(request.properties);
     if (request.operation == "gp" && isFromSensor(request) &&
@@ -124,7 +125,7 @@ void dropOtherSpellings(const Request& request, const Declarations& declarations
                     value.reset();
 }
 
-Result notDeletingFromUnknownClasses(const Request& request)
+Result notDeletingFromUnknownClasses(const ClientRequest& request)
 {
     if (request.operation != "di" || !isFrom(request, "No_Class"))
         return std::nullopt;
@@ -133,14 +134,14 @@ Result notDeletingFromUnknownClasses(const Request& request)
 
 // ---- OpenPegasus
 
-Result withoutValueOfUnknownSensors(const Request& request)
+Result withoutValueOfUnknownSensors(const ClientRequest& request)
 {
     if (request.operation != "gp" || request.object.find("no such ") == std::string::npos)
         return std::nullopt;
     return Equivalent{};
 }
 
-Result refusingUnknownClasses(const Request& request)
+Result refusingUnknownClasses(const ClientRequest& request)
 {
     if (isOnAssociations(request) &&
         (request.association == "No_Class" || isFrom(request, "No_Class")))
@@ -148,7 +149,7 @@ Result refusingUnknownClasses(const Request& request)
     return std::nullopt;
 }
 
-void renameInterop(const Request&, const Declarations&, Answer& answer)
+void renameInterop(const ClientRequest&, const Declarations&, Answer& answer)
 {
     const auto renamed = [](const std::string& text) {
         return replaced(text, "root/interop:", "root/PG_InterOp:");
@@ -165,72 +166,72 @@ void renameInterop(const Request&, const Declarations&, Answer& answer)
 
 // ---- sfcb
 
-Result withoutSingleProperties(const Request& request)
+Result withoutSingleProperties(const ClientRequest& request)
 {
     if ((request.operation != "gp" && request.operation != "sp") || isFrom(request, "No_Class"))
         return std::nullopt;
     return Equivalent{.error = 1};
 }
 
-Result withoutEmptyList(const Request& request)
+Result withoutEmptyList(const ClientRequest& request)
 {
     if (!request.hasEmptyList)
         return std::nullopt;
-    Request other = request;
+    ClientRequest other = request;
     other.hasEmptyList = false;
     return Equivalent{.requests = {other}};
 }
 
-Result notFindingAssociations(const Request& request)
+Result notFindingAssociations(const ClientRequest& request)
 {
     if (request.association == "No_Class")
         return Equivalent{.error = 6};
     return std::nullopt;
 }
 
-Result withoutMethods(const Request& request)
+Result withoutMethods(const ClientRequest& request)
 {
     if (request.operation != "cm" || isFrom(request, "No_Class"))
         return std::nullopt;
     return Equivalent{.error = 1};
 }
 
-Result withAnyResultClass(const Request& request)
+Result withAnyResultClass(const ClientRequest& request)
 {
     if (request.resultClass != "No_Class")
         return std::nullopt;
-    Request other = request;
+    ClientRequest other = request;
     other.resultClass = systemDevice;
     return Equivalent{.requests = {other}};
 }
 
-Result withoutPropertyList(const Request& request)
+Result withoutPropertyList(const ClientRequest& request)
 {
     if (!request.isReferences() || request.properties.empty() || isConformance(request))
         return std::nullopt;
-    Request other = request;
+    ClientRequest other = request;
     other.properties = "";
     if (!request.association.empty() || !isFromSensor(request))
         return Equivalent{.requests = {other}};
     return byEachAssociation(other, request);
 }
 
-Result withWholeSystems(const Request& request)
+Result withWholeSystems(const ClientRequest& request)
 {
     if (!request.isAssociators() || !isFromSensor(request) || !request.association.empty() ||
         request.properties.empty())
         return std::nullopt;
-    Request one = request;
-    Request other = request;
+    ClientRequest one = request;
+    ClientRequest other = request;
     one.association = systemDevice;
     one.properties = "";
     other.association = elementCapabilities;
-    Request conforming = request;
+    ClientRequest conforming = request;
     conforming.association = conformance;
     return Equivalent{.requests = {one, other, conforming}};
 }
 
-Result needingTheAssociation(const Request& request)
+Result needingTheAssociation(const ClientRequest& request)
 {
     const bool isKnown =
         isFromSensor(request) || (isFromCapabilities(request) && request.isAssociators());
@@ -239,7 +240,7 @@ Result needingTheAssociation(const Request& request)
     return Equivalent{.error = 1};
 }
 
-Result needingTheExactAssociation(const Request& request)
+Result needingTheExactAssociation(const ClientRequest& request)
 {
     if (!request.isAssociators() || request.association.empty() ||
         request.association == systemDevice || request.association == elementCapabilities ||
@@ -248,7 +249,7 @@ Result needingTheExactAssociation(const Request& request)
     return Equivalent{.error = isSystemDevice(request) ? 0 : 1};
 }
 
-Result refusingOtherSources(const Request& request)
+Result refusingOtherSources(const ClientRequest& request)
 {
     if ((isElementCapabilities(request) && isFromSystem(request)) ||
         (isSystemDevice(request) && request.isReferences() && isFromCapabilities(request)))
@@ -256,7 +257,7 @@ Result refusingOtherSources(const Request& request)
     return std::nullopt;
 }
 
-Result notFindingPartialAssociations(const Request& request)
+Result notFindingPartialAssociations(const ClientRequest& request)
 {
     if (request.operation != "gi" || !isFrom(request, elementCapabilities) ||
         request.properties.empty() ||
@@ -265,7 +266,7 @@ Result notFindingPartialAssociations(const Request& request)
     return Equivalent{.error = 6};
 }
 
-void spellAsTheClient(const Request& request, const Declarations&, Answer& answer)
+void spellAsTheClient(const ClientRequest& request, const Declarations&, Answer& answer)
 {
     if (!request.isReferences() || request.object.find("deviceid=") == std::string::npos)
         return;
@@ -284,7 +285,7 @@ void spellAsTheClient(const Request& request, const Declarations&, Answer& answe
     answer = changed;
 }
 
-void dropUnwantedKeys(const Request& request, const Declarations&, Answer& answer)
+void dropUnwantedKeys(const ClientRequest& request, const Declarations&, Answer& answer)
 {
     if (request.operation != "ei" || request.properties.empty() ||
         request.object != elementCapabilities)

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The object managers that a test program has for itself where in-namespaces runs it.
+// Controls the object managers, which a test program has for itself where in-namespaces runs it.
 
 #pragma once
 

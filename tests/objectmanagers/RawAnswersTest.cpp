@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// What OpenPegasus, sfcb and `sensorctl serve` answer to requests that wbemcli cannot send.
+// OpenPegasus, sfcb and `sensorctl serve` answer requests that wbemcli cannot send.
 
 #include "tests/objectmanagers/ObjectManager.h"
 #include "tests/support/CimCall.h"

@@ -1,6 +1,7 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// sensor-profile-register in OpenPegasus and sfcb.
+// sensor-profile-register registers, moves, upgrades and removes the providers in OpenPegasus and
+// sfcb.
 
 #include "tests/objectmanagers/Answer.h"
 #include "tests/objectmanagers/FormerRelease.h"

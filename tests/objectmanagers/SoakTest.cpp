@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Clients that keep asking OpenPegasus and sfcb while a chip of the machine comes and goes.
+// Clients keep asking OpenPegasus and sfcb while a chip of the machine comes and goes.
 
 #include "tests/objectmanagers/Agents.h"
 #include "tests/objectmanagers/Answer.h"
@@ -32,7 +32,7 @@ constexpr auto soakTime = 60s;
 constexpr int clientsOfEach = 8;
 constexpr std::size_t growthKilobytes = 4096;
 
-// Clients of one object manager.
+// Runs clients of one object manager in threads.
 class Clients {
 public:
     Clients(const ObjectManager& manager, Clock::time_point end) : manager_(manager)

@@ -1,10 +1,10 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The kinds of requests by which object managers differ.
+// Classifies requests into the kinds by which the answers of object managers differ.
 
 #pragma once
 
-#include "tests/objectmanagers/Request.h"
+#include "tests/objectmanagers/ClientRequest.h"
 
 #include <strings.h>
 
@@ -30,42 +30,42 @@ inline bool isOneOf(const std::string& name, std::initializer_list<const char*> 
     return false;
 }
 
-inline bool isSystemDevice(const Request& request)
+inline bool isSystemDevice(const ClientRequest& request)
 {
     return isOneOf(request.association, {systemDevice, "CIM_SystemDevice", "CIM_Component"});
 }
 
-inline bool isElementCapabilities(const Request& request)
+inline bool isElementCapabilities(const ClientRequest& request)
 {
     return isOneOf(request.association, {elementCapabilities, "CIM_ElementCapabilities"});
 }
 
-inline bool isConformance(const Request& request)
+inline bool isConformance(const ClientRequest& request)
 {
     return isOneOf(request.association, {conformance, "CIM_ElementConformsToProfile"});
 }
 
-inline bool isFrom(const Request& request, const char* className)
+inline bool isFrom(const ClientRequest& request, const char* className)
 {
     return request.object.starts_with(className + std::string("."));
 }
 
-inline bool isFromSystem(const Request& request)
+inline bool isFromSystem(const ClientRequest& request)
 {
     return isFrom(request, "ZUMLO_ComputerSystem");
 }
 
-inline bool isFromCapabilities(const Request& request)
+inline bool isFromCapabilities(const ClientRequest& request)
 {
     return isFrom(request, "ZUMLO_SensorEnabledLogicalElementCapabilities");
 }
 
-inline bool isFromSensor(const Request& request)
+inline bool isFromSensor(const ClientRequest& request)
 {
     return isFrom(request, "ZUMLO_NumericSensor");
 }
 
-inline bool isOnAssociations(const Request& request)
+inline bool isOnAssociations(const ClientRequest& request)
 {
     return request.isAssociators() || request.isReferences();
 }

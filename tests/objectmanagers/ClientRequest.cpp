@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-#include "tests/objectmanagers/Request.h"
+#include "tests/objectmanagers/ClientRequest.h"
 #include "tests/support/Texts.h"
 
 #include <utility>
@@ -40,7 +40,7 @@ const std::vector<std::pair<std::string, std::string>> roles = {{"PartComponent"
 
 // Each object manager refuses them, and answers what follows as if they had not been sent.
 // Before it modifies an instance, wbemcli looks for the property in it.
-void addRefused(std::vector<Request>& requests, const std::string& path,
+void addRefused(std::vector<ClientRequest>& requests, const std::string& path,
     const std::string& assignment = "Caption=x")
 {
     for (const std::string operation : {"ci", "mi", "sp"})
@@ -48,7 +48,7 @@ void addRefused(std::vector<Request>& requests, const std::string& path,
     requests.push_back({"di", path});
 }
 
-void addSingleProperties(std::vector<Request>& requests, const std::string& path)
+void addSingleProperties(std::vector<ClientRequest>& requests, const std::string& path)
 {
     for (const std::string property : {"CurrentReading", "PossibleStates", "DeviceID", "caption",
              "Status", "EnabledDefault", "No_Property"})
@@ -56,13 +56,13 @@ void addSingleProperties(std::vector<Request>& requests, const std::string& path
 }
 
 void addEmptyLists(
-    std::vector<Request>& requests, const std::string& className, const std::string& path)
+    std::vector<ClientRequest>& requests, const std::string& className, const std::string& path)
 {
     requests.push_back({.operation = "ei", .object = className, .hasEmptyList = true});
     requests.push_back({.operation = "gi", .object = path, .hasEmptyList = true});
 }
 
-void addEnumerations(std::vector<Request>& requests)
+void addEnumerations(std::vector<ClientRequest>& requests)
 {
     for (const Texts& classes : {instanceClasses, {profile}, associationClasses, enumeratedClasses})
         for (const std::string& name : classes)
@@ -75,7 +75,7 @@ void addEnumerations(std::vector<Request>& requests)
                 requests.push_back({.operation = "ei", .object = name, .properties = list});
 }
 
-void addObjects(std::vector<Request>& requests, const PathsOf& pathsOf)
+void addObjects(std::vector<ClientRequest>& requests, const PathsOf& pathsOf)
 {
     for (const auto& [classes, lists] : {std::pair(instanceClasses, propertyLists),
              {{profile}, propertyLists}, {associationClasses, endLists}})
@@ -89,7 +89,7 @@ void addObjects(std::vector<Request>& requests, const PathsOf& pathsOf)
 }
 
 // Paths that differ in one thing from that of a sensor.
-void addOtherPaths(std::vector<Request>& requests, const std::string& path)
+void addOtherPaths(std::vector<ClientRequest>& requests, const std::string& path)
 {
     for (const auto& [from, to] : {std::pair("DeviceID=\"", "DeviceID=\"no such "),
              {"SystemName=\"", "SystemName=\"no-such-"}, {"DeviceID=", "deviceid="},
@@ -100,13 +100,13 @@ void addOtherPaths(std::vector<Request>& requests, const std::string& path)
 }
 
 // No class offers a method.
-void addMethods(std::vector<Request>& requests, const std::string& path)
+void addMethods(std::vector<ClientRequest>& requests, const std::string& path)
 {
     for (const std::string method : {"RequestStateChange", "No_Method"})
         requests.push_back({.operation = "cm", .object = path, .properties = method});
 }
 
-void addFiltered(std::vector<Request>& requests, const std::string& path)
+void addFiltered(std::vector<ClientRequest>& requests, const std::string& path)
 {
     for (const std::string& association : associations) {
         for (const std::string operation : {"ai", "ain"}) {
@@ -127,9 +127,30 @@ void addFiltered(std::vector<Request>& requests, const std::string& path)
 
 } // namespace
 
-std::vector<Request> allRequests(const PathsOf& pathsOf)
+std::vector<std::string> ClientRequest::arguments(const std::string& url) const
 {
-    std::vector<Request> requests;
+    std::vector<std::string> words = {operation};
+    // References have no result class but the association.
+    for (const auto& [option, value] : {std::pair(isReferences() ? "-arc" : "-ac", association),
+             {"-arc", resultClass}, {"-ar", role}, {"-arr", resultRole}})
+        if (!value.empty())
+            words.insert(words.end(), {option, value});
+    words.push_back(url);
+    if (!properties.empty() || hasEmptyList)
+        words.push_back(properties);
+    return words;
+}
+
+std::ostream& operator<<(std::ostream& stream, const ClientRequest& request)
+{
+    for (const std::string& word : request.arguments(request.object))
+        stream << word << ' ';
+    return stream;
+}
+
+std::vector<ClientRequest> allRequests(const PathsOf& pathsOf)
+{
+    std::vector<ClientRequest> requests;
     const std::string sensor = pathsOf("ZUMLO_NumericSensor").at(0);
     const std::string noSensor = replaced(sensor, "DeviceID=\"", "DeviceID=\"no such ");
     const std::string ofNoClass = "No_Class.Key=\"1\"";
