@@ -19,6 +19,7 @@
 #include "tests/support/CimCall.h"
 #include "tests/support/Environment.h"
 #include "tests/support/HttpClient.h"
+#include "tools/serve/FreedMemory.h"
 
 #include <fcntl.h>
 #include <sensors/sensors.h>
@@ -312,6 +313,7 @@ void compare(int wanted, std::size_t rounds)
 int main(int argc, char** argv)
 {
     try {
+        Tools::keepFreedMemory(1); // as in the server
         RynLog::configure({6000, "off", "off"});
         const Testing::EnvironmentVariable hardware("VORN_INSTRUMENTATION", "hwmon");
         const Testing::EnvironmentVariable log("RYNLOG_LOG", "off");

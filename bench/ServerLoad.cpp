@@ -16,6 +16,7 @@
 #include "tests/providers/Factories.h"
 #include "tests/support/CimCall.h"
 #include "tests/support/HttpClient.h"
+#include "tools/serve/FreedMemory.h"
 
 #include <algorithm>
 #include <cstdio>
@@ -210,6 +211,7 @@ void printRest()
 int main(int argc, char** argv)
 {
     try {
+        Tools::keepFreedMemory(1); // as in the server
         const Seconds time(argc > 1 ? std::atof(argv[1]) : 3.0);
         printRest();
         printComparison();

@@ -12,6 +12,7 @@
 #include "tools/cim/ProviderClient.h"
 #include "tools/commands/Commands.h"
 #include "tools/output/Output.h"
+#include "tools/serve/FreedMemory.h"
 #include "tools/serve/Greeting.h"
 #include "tools/serve/MemoryReturn.h"
 #include "tools/serve/Privileges.h"
@@ -22,7 +23,6 @@
 
 #include <CLI/CLI.hpp>
 
-#include <malloc.h>
 #include <unistd.h>
 
 #include <cerrno>
@@ -110,16 +110,6 @@ void beginLog(const std::string& text, Output& out)
         out.flush();
     }
     throw std::runtime_error(problem);
-}
-
-// Has the allocator keep the memory of an answer for the next one: mapping it again page by page
-// takes a quarter of the time that its objects take. Each arena keeps up to 8 MiB, so that their
-// number is limited to that of the workers.
-void keepFreedMemory(std::size_t workers)
-{
-    ::mallopt(M_ARENA_MAX, static_cast<int>(workers));
-    ::mallopt(M_MMAP_THRESHOLD, 2 << 20);
-    ::mallopt(M_TRIM_THRESHOLD, 8 << 20);
 }
 
 // Serves until a signal ends it. Returns false when requests still run at the end of the grace

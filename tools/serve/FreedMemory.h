@@ -1,0 +1,21 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#pragma once
+
+#include <malloc.h>
+
+#include <cstddef>
+
+namespace Tools {
+
+// Has the allocator keep the memory of an answer for the next one: mapping it again page by page
+// takes a third of the time that its objects take. Each arena of the allocator keeps up to 8 MiB,
+// so that their number is limited to that of the workers. REQUIRES: the process has one thread.
+inline void keepFreedMemory(std::size_t workers)
+{
+    ::mallopt(M_ARENA_MAX, static_cast<int>(workers));
+    ::mallopt(M_MMAP_THRESHOLD, 2 << 20);
+    ::mallopt(M_TRIM_THRESHOLD, 8 << 20);
+}
+
+} // namespace Tools
