@@ -12,10 +12,12 @@ namespace Vorn {
 std::unique_ptr<Source> openSource(const SourceEntry& entry)
 {
     if (entry.scheme == "hwmon") {
-        if (!entry.argument.empty())
-            throw std::runtime_error(
-                "source \"hwmon:" + entry.argument + "\": hwmon takes no argument");
-        return std::make_unique<HwmonSource>();
+        if (entry.argument.empty())
+            return std::make_unique<HwmonSource>(HwmonSource::Order::serial);
+        if (entry.argument == "parallel")
+            return std::make_unique<HwmonSource>(HwmonSource::Order::parallel);
+        throw std::runtime_error(
+            "source \"" + entry.text + "\": hwmon takes no argument but parallel");
     }
     if (entry.scheme == "model") {
         if (entry.argument.empty())

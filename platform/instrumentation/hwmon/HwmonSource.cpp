@@ -2,33 +2,23 @@
 
 #include "platform/instrumentation/hwmon/HwmonSource.h"
 
-#include "platform/instrumentation/hwmon/ChannelReader.h"
 #include "platform/instrumentation/hwmon/ChipList.h"
-#include "platform/instrumentation/hwmon/Status.h"
+
+#include <algorithm>
+#include <atomic>
+#include <chrono>
+#include <future>
+#include <utility>
 
 namespace Vorn {
 
 using NodeLexicon::NodeType;
 
-namespace {
-
-// Returns the code of the unit in the DMTF value map CIM_NumericSensor.BaseUnits.
-unsigned baseUnitsOf(NodeType type)
-{
-    constexpr unsigned degreesC = 2;
-    constexpr unsigned volts = 5;
-    constexpr unsigned revolutionsPerMinute = 19;
-    if (type == NodeType::Tachometer)
-        return revolutionsPerMinute;
-    return type == NodeType::Voltage ? volts : degreesC;
-}
-
-} // namespace
-
 std::vector<Node> HwmonSource::nodes(NodeType type)
 {
-    chip_ = nullptr;
     catalogue_ = Hwmon::ChipList::instance().present();
+    reader_.emplace(catalogue_);
+    ahead_.clear();
     std::vector<Node> nodes;
     for (const Hwmon::Feature& feature : catalogue_->features)
         if (feature.type == type)
@@ -38,41 +28,41 @@ std::vector<Node> HwmonSource::nodes(NodeType type)
 
 NodeReading HwmonSource::read(const Node& node)
 {
-    constexpr unsigned lostCommunication = 13;
     const Hwmon::Feature& feature = catalogue_->features.at(node.token);
-    const Hwmon::Chip& chip = catalogue_->chips[feature.chip];
-    const Hwmon::Channel channel = Hwmon::readChannel(chip, folderOf(chip), feature);
-    NodeReading values;
-    if (!channel.reading && Hwmon::folderId(chip.path) != chip.id) {
-        values.status = lostCommunication;
-        return values;
-    }
-    values.status = Hwmon::statusOf(channel);
-    // The reading of a channel with a fault, such as an open diode, is not to be trusted (the
-    // kernel's sysfs-interface).
-    if (!channel.hasFault)
-        values.reading = channel.reading;
-    values.lowerNonCritical = channel.limits.min;
-    values.upperNonCritical = channel.limits.max;
-    values.lowerCritical = channel.limits.lcrit;
-    values.upperCritical = channel.limits.crit;
-    values.upperFatal = channel.limits.emergency;
-    values.baseUnits = baseUnitsOf(feature.type);
-    values.possibleStates = Hwmon::possibleStatesOf(channel);
-    return values;
+    if (order_ == Order::serial)
+        return reader_->read(feature);
+    if (ahead_.empty())
+        readAhead(feature.type);
+    auto reading = std::exchange(ahead_[node.token], std::nullopt);
+    return reading ? std::move(*reading) : reader_->read(feature);
 }
 
-// Returns a descriptor of the chip's folder, which stays open until the folder of another chip is
-// requested.
-int HwmonSource::folderOf(const Hwmon::Chip& chip)
+// Reads the nodes of the type, chip by chip. A further thread starts when the last one has not
+// ended after an interval: where all chips are fast, more threads would only cost time.
+void HwmonSource::readAhead(NodeType type)
 {
-    if (chip.folder.isOpen())
-        return chip.folder.number();
-    if (chip_ != &chip) {
-        folder_ = chip.openFolder();
-        chip_ = &chip;
-    }
-    return folder_.number();
+    constexpr std::size_t maximumThreads = 16;
+    constexpr auto interval = std::chrono::milliseconds(2);
+    ahead_.resize(catalogue_->features.size());
+    std::atomic<std::size_t> next = 0;
+    const auto readChips = [&] {
+        const auto& features = catalogue_->features;
+        Hwmon::NodeReader reader(catalogue_);
+        for (std::size_t chip = next++; chip < catalogue_->chips.size(); chip = next++) {
+            auto feature = std::ranges::lower_bound(features, chip, {}, &Hwmon::Feature::chip);
+            for (; feature != features.end() && feature->chip == chip; ++feature)
+                if (feature->type == type)
+                    ahead_[feature->node.token] = reader.read(*feature);
+        }
+    };
+    // Where no thread can be started, get() reads the chips.
+    std::vector<std::future<void>> threads;
+    do
+        threads.push_back(std::async(readChips));
+    while (threads.size() < maximumThreads &&
+           threads.back().wait_for(interval) == std::future_status::timeout);
+    for (auto& thread : threads)
+        thread.get();
 }
 
 } // namespace Vorn

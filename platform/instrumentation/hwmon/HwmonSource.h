@@ -2,18 +2,14 @@
 
 #pragma once
 
-#include "platform/instrumentation/Descriptor.h"
 #include "platform/instrumentation/Source.h"
+#include "platform/instrumentation/hwmon/NodeReader.h"
 
 #include <memory>
+#include <optional>
 #include <vector>
 
 namespace Vorn {
-
-namespace Hwmon {
-struct Catalogue;
-struct Chip;
-} // namespace Hwmon
 
 // Serves the fans, voltages and temperatures of the kernel's hwmon interface, a node for each
 // feature, with the `label`, `compute` and `ignore` lines of libsensors' configuration applied.
@@ -21,6 +17,12 @@ struct Chip;
 // meanwhile has status 13 and no properties.
 class HwmonSource final : public Source {
 public:
+    // In parallel, all nodes of a listing are read when the first of them is, in threads that end
+    // with that call: a chip that takes long to be read does not delay the others.
+    enum class Order { serial, parallel };
+
+    explicit HwmonSource(Order order = Order::serial) : order_(order) {}
+
     // Throws std::runtime_error when libsensors cannot be used. A kernel without hwmon has no
     // nodes.
     std::vector<Node> nodes(NodeLexicon::NodeType type) override;
@@ -28,12 +30,12 @@ public:
     NodeReading read(const Node& node) override;
 
 private:
-    int folderOf(const Hwmon::Chip& chip);
+    void readAhead(NodeLexicon::NodeType type);
 
+    Order order_;
     std::shared_ptr<const Hwmon::Catalogue> catalogue_; // of the last listing; null before
-    // The last chip that was read without an open folder in the catalogue, and its folder.
-    const Hwmon::Chip* chip_ = nullptr;
-    Descriptor folder_;
+    std::optional<Hwmon::NodeReader> reader_;
+    std::vector<std::optional<NodeReading>> ahead_; // by token, each until it is requested
 };
 
 } // namespace Vorn
