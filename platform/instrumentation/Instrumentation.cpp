@@ -8,6 +8,7 @@
 #include "platform/text/Escape.h"
 #include "platform/text/Utf8.h"
 
+#include <algorithm>
 #include <cstdlib>
 #include <exception>
 #include <optional>
@@ -180,7 +181,9 @@ std::string Instrumentation::getPathToNode() const
 
 std::string Instrumentation::convertPathToString(const std::string& path) const
 {
-    return Text::escapeControls(Text::toValidUtf8(path));
+    const bool isPrintable = std::all_of(path.begin(), path.end(),
+        [](char character) { return character >= ' ' && character <= '~'; });
+    return isPrintable ? path : Text::escapeControls(Text::toValidUtf8(path));
 }
 
 std::string Instrumentation::getNodeDescription() const
