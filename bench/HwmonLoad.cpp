@@ -1,11 +1,12 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// What requests cost on a machine with real chips, beside what the kernel, libsensors and the
-// program `sensors` take for the same attributes. Prints a table of medians for each machine.
+// Measures requests on machines with chips, and reads of the same attributes by the kernel's files,
+// by libsensors and by the program `sensors`. Prints a table of medians for each machine.
 //
 //     bench_hwmon [rounds]
 
 #include "bench/HwmonTree.h"
+#include "bench/Median.h"
 #include "bench/ServerProcess.h"
 #include "bench/Skim.h"
 #include "host/broker/Broker.h"
@@ -14,6 +15,7 @@
 #include "host/broker/Request.h"
 #include "host/broker/Result.h"
 #include "model/SensorHarvest.h"
+#include "platform/instrumentation/Descriptor.h"
 #include "platform/logging/LogSettings.h"
 #include "tests/providers/Factories.h"
 #include "tests/support/CimCall.h"
@@ -37,7 +39,6 @@
 #include <ctime>
 #include <exception>
 #include <functional>
-#include <memory>
 #include <stdexcept>
 #include <string>
 #include <vector>
@@ -83,26 +84,13 @@ void expect(bool holds, const char* what)
 
 // ---- In this process ----
 
-class Descriptor {
-public:
-    explicit Descriptor(const std::string& path) : number_(::open(path.c_str(), O_RDONLY)) {}
-    ~Descriptor() { ::close(number_); }
-    Descriptor(const Descriptor&) = delete;
-    Descriptor& operator=(const Descriptor&) = delete;
-
-    int number() const { return number_; }
-
-private:
-    int number_;
-};
-
 // Reads each attribute from the descriptor of its chip's folder.
 class RawReads {
 public:
     explicit RawReads(const HwmonTree& tree) : tree_(&tree)
     {
         for (const HwmonTree::Chip& chip : tree.chips())
-            folders_.push_back(std::make_unique<Descriptor>(chip.folder));
+            folders_.emplace_back(::open(chip.folder.c_str(), O_RDONLY | O_DIRECTORY));
     }
 
     void operator()() const
@@ -110,7 +98,7 @@ public:
         std::array<char, 64> text{};
         for (std::size_t i = 0; i < folders_.size(); ++i)
             for (const std::string& attribute : tree_->chips()[i].attributes) {
-                const int file = ::openat(folders_[i]->number(), attribute.c_str(), O_RDONLY);
+                const int file = ::openat(folders_[i].number(), attribute.c_str(), O_RDONLY);
                 expect(::read(file, text.data(), text.size()) > 0, "an unreadable attribute");
                 ::close(file);
             }
@@ -118,7 +106,7 @@ public:
 
 private:
     const HwmonTree* tree_;
-    std::vector<std::unique_ptr<Descriptor>> folders_;
+    std::vector<Vorn::Descriptor> folders_;
 };
 
 // Reads each attribute through libsensors, whose list of chips the requests have initialised.
@@ -209,13 +197,6 @@ struct Row {
     Cost median = {};
 };
 
-double medianOf(std::vector<double>& values)
-{
-    std::nth_element(values.begin(),
-        values.begin() + static_cast<std::ptrdiff_t>(values.size() / 2), values.end());
-    return values[values.size() / 2];
-}
-
 // Measures the rows in turn, so that what disturbs the machine meets all of them.
 void measure(std::vector<Row>& rows, std::size_t rounds)
 {
@@ -230,7 +211,7 @@ void measure(std::vector<Row>& rows, std::size_t rounds)
             wall[i].push_back(cost.wall);
         }
     for (std::size_t i = 0; i < rows.size(); ++i)
-        rows[i].median = {medianOf(cpu[i]), medianOf(wall[i])};
+        rows[i].median = {Bench::median(cpu[i]), Bench::median(wall[i])};
 }
 
 void print(const std::vector<Row>& rows, std::size_t sensors)

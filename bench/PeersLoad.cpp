@@ -5,6 +5,7 @@
 //
 //     bench_peers [rounds]
 
+#include "bench/Median.h"
 #include "bench/ModelMachine.h"
 #include "bench/ServerProcess.h"
 #include "bench/Skim.h"
@@ -14,13 +15,13 @@
 #include "tests/support/HttpClient.h"
 #include "tests/support/Texts.h"
 
-#include <algorithm>
 #include <chrono>
 #include <cstdio>
 #include <cstdlib>
 #include <exception>
 #include <stdexcept>
 #include <string>
+#include <utility>
 #include <vector>
 
 namespace {
@@ -60,13 +61,7 @@ public:
     }
 
     // Returns the median in milliseconds of what was measured since the last call.
-    double median()
-    {
-        std::sort(durations_.begin(), durations_.end());
-        const double median = durations_.at(durations_.size() / 2);
-        durations_.clear();
-        return median;
-    }
+    double median() { return Bench::median(std::exchange(durations_, {})); }
 
 private:
     // Returns false where the server has closed the connection.
@@ -174,7 +169,10 @@ void printTable(int rounds)
 int main(int argc, char** argv)
 {
     try {
-        printTable(argc > 1 ? std::atoi(argv[1]) : 100);
+        const int rounds = argc > 1 ? std::atoi(argv[1]) : 100;
+        if (rounds <= 0)
+            throw std::runtime_error("the number of rounds is not positive");
+        printTable(rounds);
         return 0;
     } catch (const std::exception& error) {
         std::fprintf(stderr, "bench_peers: %s\n", error.what());

@@ -5,6 +5,7 @@
 //
 //     bench_server [seconds for each line of the table]
 
+#include "bench/Median.h"
 #include "bench/ModelMachine.h"
 #include "bench/ServerProcess.h"
 #include "bench/Skim.h"
@@ -16,6 +17,7 @@
 #include "tests/providers/Factories.h"
 #include "tests/support/CimCall.h"
 #include "tests/support/HttpClient.h"
+#include "tests/support/Texts.h"
 #include "tools/serve/FreedMemory.h"
 
 #include <algorithm>
@@ -31,6 +33,7 @@
 
 namespace {
 
+using Bench::median;
 using Bench::ModelMachine;
 using Bench::ServerProcess;
 using Bench::skim;
@@ -54,20 +57,10 @@ std::string getInstance(std::int64_t sensors)
             Testing::cimInstanceName(Class, {{"DeviceID", ModelMachine::someDeviceID(sensors)}})));
 }
 
-double median(Durations durations)
-{
-    std::sort(durations.begin(), durations.end());
-    return durations.at(durations.size() / 2);
-}
-
 // Throws unless the answer has so many instances.
 void check(const Testing::HttpReply& reply, std::int64_t instances)
 {
-    std::int64_t found = 0;
-    for (auto at = reply.body.find("<INSTANCE "); at != std::string::npos;
-         at = reply.body.find("<INSTANCE ", at + 1))
-        ++found;
-    if (found != instances)
+    if (static_cast<std::int64_t>(Testing::countOf(reply.body, "<INSTANCE ")) != instances)
         throw std::runtime_error("a request failed: " + reply.body.substr(0, 500));
 }
 

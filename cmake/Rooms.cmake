@@ -1,9 +1,8 @@
 # Each room of the source tree is one static library; includes are written from the root, so
 # that every include line names the room it reaches into.
 
-# The presets compile several files of a target as one, in a fraction of the time; only `coverage`
-# compiles each by itself. FILES_APART is for targets whose files define the same names in unnamed
-# namespaces.
+# The presets compile several files of a target as one, in a fraction of the time. FILES_APART is
+# for targets whose files define the same names in unnamed namespaces.
 
 # sensor_profile_room(NAME [FILES_APART] SOURCES ... [USES public libraries ...]
 #                     [PRIVATELY private libraries ...])

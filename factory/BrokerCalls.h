@@ -1,7 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Calls of the broker that test their results: an object that is null or has no handle is returned
-// as null. Objects belong to the broker. A `CMPIStatus*` is passed on to the broker and may be
+// Calls of the broker that test the objects they use. Objects belong to the broker. A `CMPIStatus*` is passed on to the broker and may be
 // null.
 
 #pragma once
@@ -18,8 +17,9 @@ CMPIString* classNameOf(const CMPIObjectPath* path, CMPIStatus* rc);
 // Returns whether the class name of the path is this one; case matters.
 bool isExactlyOfClass(const CMPIObjectPath* path, const char* className);
 
-// Makes a path without keys, with the namespace of `ref`, the class and the host.
-// `again` is the status for setting the namespace once more. Returns null when the broker fails.
+// Makes a path without keys, with the namespace of `ref`, the class and the host. The namespace is
+// read and set a second time once the path is made, and `again` receives the status of that read.
+// Returns null when the broker fails.
 CMPIObjectPath* newPath(const CMPIBroker* broker, const CMPIObjectPath* ref, const char* className,
     const std::string& host, CMPIStatus* rc, CMPIStatus* again = nullptr);
 

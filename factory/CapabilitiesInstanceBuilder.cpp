@@ -8,7 +8,6 @@
 #include "factory/PropertySelection.h"
 #include "factory/SensorFactory.h"
 #include "factory/TraceLines.h"
-#include "platform/utilities/ProviderUtilities.h"
 
 #include <cmpimacs.h>
 
@@ -20,11 +19,11 @@ namespace {
 
 // Makes an instance with its property filter. Returns what the broker returned when that is not
 // usable.
-CMPIInstance* newCapabilitiesInstance(
-    const CMPIBroker* broker, const CMPIObjectPath* ref, const char** properties, CMPIStatus* rc)
+CMPIInstance* newCapabilitiesInstance(const CMPIBroker* broker, const CMPIObjectPath* ref,
+    const std::string& host, const char** properties, CMPIStatus* rc)
 {
     const CMPIObjectPath* const path =
-        newPath(broker, ref, SensorEnabledLogicalElementCapClass, getSystemName(), rc);
+        newPath(broker, ref, SensorEnabledLogicalElementCapClass, host, rc);
     if (path == nullptr)
         return nullptr;
     CMPIInstance* const instance = CMNewInstance(broker, path, nullptr);
@@ -48,7 +47,8 @@ CMPIInstance* SensorFactory::makeSensorEnabledLogicalElementCapInstance(const CM
         });
     traced.entering(FactoryLines::makeCapabilitiesInstance.entry);
     const PropertySelection selection(properties, isObjPath);
-    CMPIInstance* const instance = newCapabilitiesInstance(broker, ref, properties, rc);
+    CMPIInstance* const instance =
+        newCapabilitiesInstance(broker, ref, texts.systemName(), properties, rc);
     if (isUsable(instance)) {
         const InstanceWriter writer(broker, instance);
         writer.setText("InstanceID", snsrCap.getInstanceID());

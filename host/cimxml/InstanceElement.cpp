@@ -37,7 +37,7 @@ bool isSingle(const Value& value)
 
 // Appends the property's element with an empty VALUE where its value is a single one, else without
 // a value. Returns the offset at which the value is to be inserted.
-std::size_t writeFrame(std::string& out, std::string_view name, CMPIType valueType, bool isSingle,
+std::size_t writeFrame(std::string& out, std::string_view name, CMPIType valueType, bool hasSingle,
     const ClassDeclaration* declared, const ObjectSelection& selection)
 {
     const PropertyDeclaration* const property =
@@ -61,7 +61,7 @@ std::size_t writeFrame(std::string& out, std::string_view name, CMPIType valueTy
         writeEmbeddedObject(element, property->qualifiers);
     if (property != nullptr)
         writeQualifiers(out, property->qualifiers, selection);
-    if (!isSingle)
+    if (!hasSingle)
         return out.size();
     const Markup single(out, "VALUE");
     return out.size();
@@ -72,9 +72,8 @@ std::size_t writeFrame(std::string& out, std::string_view name, CMPIType valueTy
 void writeValue(std::string& out, const Value& value)
 {
     if (isSingle(value)) {
-        out.append(std::string_view("<VALUE>"));
+        const Markup element(out, "VALUE");
         writeContent(out, value);
-        out.append(std::string_view("</VALUE>"));
     } else if (const Array* const array = value.array()) {
         const Markup element(out, array->type() == CMPI_ref ? "VALUE.REFARRAY" : "VALUE.ARRAY");
         for (const Value& each : array->elements())

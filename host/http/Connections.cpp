@@ -45,11 +45,16 @@ ClientConnection* Connections::add(
     int descriptor, const Address& client, std::shared_ptr<const Certificate> certificate)
 {
     std::unique_lock lock(mutex_);
-    if (const auto refusal = refusalOf(client)) {
+    const std::size_t count = all_.size();
+    const bool areTooMany = count >= limits_.maximumConnections;
+    if (areTooMany || exceedsLimitOfAddress(client)) {
         ::shutdown(descriptor, SHUT_RDWR);
         lock.unlock();
         if (refusals_.allowsReport())
-            report({"add", "Connections", __LINE__}, *refusal);
+            report({"add", "Connections", __LINE__},
+                "refused a connection from " + client.host() + ": there are " +
+                    std::to_string(count) +
+                    (areTooMany ? "" : ", too many of them from this address"));
         return nullptr;
     }
     ClientConnection& connection = all_.emplace_back(descriptor, client, std::move(certificate));
@@ -62,17 +67,13 @@ ClientConnection* Connections::add(
     return &connection;
 }
 
-std::optional<std::string> Connections::refusalOf(const Address& client) const
+bool Connections::exceedsLimitOfAddress(const Address& client) const
 {
-    const bool areTooMany = all_.size() >= limits_.maximumConnections;
     const auto ofNetwork = std::count_if(
         all_.begin(), all_.end(), [network = client.network()](const ClientConnection& each) {
             return each.network == network;
         });
-    if (!areTooMany && static_cast<std::size_t>(ofNetwork) < limits_.maximumConnectionsPerAddress)
-        return std::nullopt;
-    return "refused a connection from " + client.host() + ": there are " +
-           std::to_string(all_.size()) + (areTooMany ? "" : ", too many of them from this address");
+    return static_cast<std::size_t>(ofNetwork) >= limits_.maximumConnectionsPerAddress;
 }
 
 void Connections::remove(ClientConnection& connection)

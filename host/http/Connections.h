@@ -87,12 +87,13 @@ public:
 private:
     void watch(const std::stop_token& stop);
 
-    // REQUIRES: the mutex is held. No line is written to the log meanwhile, which may be slow: each
-    // function returns what is to be logged.
+    // The functions that follow require that the mutex is held. As the log may be slow, none writes
+    // to it meanwhile.
+
+    // Returns what is to be logged.
     std::vector<std::string> closeOverdue();
     std::chrono::seconds timeoutOf(Phase phase) const;
-    // Returns why the client exceeds a limit; nothing when it does not.
-    std::optional<std::string> refusalOf(const Address& client) const;
+    bool exceedsLimitOfAddress(const Address& client) const;
 
     const Limits& limits_;
     mutable std::mutex mutex_;

@@ -38,8 +38,8 @@ private:
     };
 
     void start(const Certificate* certificate);
-    // Logs a line of the library: each while it starts, then one a minute, and the others as
-    // details, since clients cause some of them.
+    // Logs a line of the library: each while it starts; then at most one a minute that contains
+    // "Failed", and all others as details, since clients cause some of them.
     static void logLine(void* daemon, const char* format, std::va_list arguments) noexcept;
 
     Service& service_;

@@ -19,7 +19,8 @@ namespace Host {
 std::vector<ProviderRegistration> sensorProfileProviders(
     const std::string& sensorLibrary, const std::optional<std::string>& computerSystemLibrary);
 
-// Returns these and the providers of the profile's registration, which need root/interop.
+// Returns the providers of sensorProfileProviders() and those of the profile's registration, which
+// need root/interop.
 std::vector<ProviderRegistration> registeredProfileProviders(
     const std::string& sensorLibrary, const std::optional<std::string>& computerSystemLibrary);
 

@@ -29,9 +29,10 @@ private:
 // written.
 int writeWhole(int descriptor, std::string_view bytes) noexcept;
 
-// Does the same on the process's standard error, but never blocks: when its buffer is full, the
-// rest is not written (EAGAIN). A text of up to PIPE_BUF bytes is one write, so that lines of
-// several threads are not interleaved.
+// Does the same on the process's standard error, but does not wait for a reader: when a pipe is
+// full, the rest is not written (EAGAIN). It blocks only where another process fills the pipe
+// between the test and the write, and on a terminal that is suspended. A text of up to PIPE_BUF
+// bytes is one write, so that lines of several threads are not interleaved.
 int writeToStandardError(std::string_view text) noexcept;
 
 } // namespace RynLog

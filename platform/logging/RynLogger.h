@@ -11,12 +11,16 @@ namespace RynLog {
 // Levels in use: 3000 marks with parameters, 4000 marks without, 6000 messages; a higher
 // number is more important. Lines below the wanted level are dropped.
 //
-// A line in a file or on standard error is written by one system call: 2026-11-21T01:02:03.000004Z
-// log 6000 Nimbrel.Sensor setVector(Sensor:740) text Time is UTC. In every text of a line a newline
-// appears as \n, another control character as \xNN and a backslash as \\, so that no text can look
-// like a second line. In syslog the line begins with the channel (syslog has a clock of its own);
-// facility daemon, severity warning from level 6000 up, debug below. The identity under which the
-// process writes to syslog is left as the process set it.
+// A line in a file or on standard error has the UTC time, the channel, the level, the component,
+// the function with file and line, and the text:
+//
+//     2026-11-21T01:02:03.000004Z log 6000 Nimbrel.Sensor setVector(Sensor:740) text
+//
+// In a file it is written by one system call, on standard error in pieces of PIPE_BUF bytes. In
+// every text of a line a newline appears as \n, another control character as \xNN and a backslash
+// as \\, so that no text can look like a second line. In syslog the line begins with the channel
+// (syslog has a clock of its own); facility daemon, severity warning from level 6000 up, debug
+// below. The identity under which the process writes to syslog is left as the process set it.
 //
 // Every function may be called from any thread and never throws: a line that cannot be
 // written is lost. A null text is written as (null).
