@@ -6,7 +6,10 @@
 
 namespace {
 
-using Tools::isBefore;
+bool isBefore(std::string_view first, std::string_view second)
+{
+    return Tools::compareNaturally(first, second) < 0;
+}
 
 TEST(NaturalOrderTest, NumbersAreComparedByValue)
 {

@@ -67,7 +67,7 @@ private:
                 sensors.emplace_back(*found.object);
         }
         if (source_.readsHwmon())
-            ChipDevices().nameIn(sensors);
+            nameDevices(sensors);
         write(out, objects, sensors);
         return {};
     }

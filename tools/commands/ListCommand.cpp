@@ -98,9 +98,9 @@ private:
 
     void write(Output& out, Sensors sensors) const
     {
-        std::optional<ChipDevices> chips;
-        if (source_.readsHwmon() && display_.form() != Form::cim)
-            chips.emplace().nameIn(sensors);
+        const bool isOfKernel = source_.readsHwmon();
+        if (isOfKernel && display_.form() != Form::cim)
+            nameDevices(sensors);
         switch (display_.form()) {
         case Form::csv:
             return writeCsv(out, sensors);
@@ -118,7 +118,8 @@ private:
         const TextStyle style = display_.style();
         out.write(sensorTable(sensors, isGrouped ? Grouping::byChip : Grouping::none, style));
         if (isGrouped)
-            writeSummary(out, summaryOf(sensors), chips ? chips->otherChannels() : "", style);
+            writeSummary(out, summaryOf(sensors),
+                isOfKernel && !selection_.isGiven() ? otherChannels() : "", style);
     }
 
     static void writeInstances(Output& out, const Sensors& sensors)

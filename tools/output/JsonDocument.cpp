@@ -94,7 +94,10 @@ void appendInstance(std::string& json, const Host::Instance& instance)
         appendValue(json, property.value);
         separator = ",";
     }
-    json.append(*separator == '\0' ? "" : lineOfMember).append("}").append(lineOfInstance).append("}");
+    json.append(*separator == '\0' ? "" : lineOfMember)
+        .append("}")
+        .append(lineOfInstance)
+        .append("}");
 }
 
 } // namespace

@@ -5,6 +5,7 @@
 #include "platform/text/Utf8.h"
 #include "tools/output/Utf8.h"
 
+#include <algorithm>
 #include <array>
 #include <cstdio>
 
@@ -46,6 +47,11 @@ char shortEscape(char32_t character)
 void appendString(std::string& json, std::string_view text)
 {
     json += '"';
+    // Most texts consist of printable ASCII only.
+    const auto plain = std::find_if_not(text.begin(), text.end(),
+        [](char c) { return c >= ' ' && c <= '~' && c != '"' && c != '\\'; });
+    json.append(text.begin(), plain);
+    text.remove_prefix(static_cast<std::size_t>(plain - text.begin()));
     while (!text.empty()) {
         const Text::Character character = Text::firstCharacter(text);
         if (const char letter = shortEscape(character.code))

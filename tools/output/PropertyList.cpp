@@ -91,13 +91,16 @@ std::string propertyList(const Host::Instance& instance, const TextStyle& style)
     column += 2 * margin;
 
     const Sensor sensor(instance);
-    std::string text = emphasized(printable(nameOf(instance), style.isUtf8), Emphasis::heading, style.isColored) + "\n";
+    std::string text =
+        emphasized(printable(nameOf(instance), style.isUtf8), Emphasis::heading, style.isColored) +
+        "\n";
     for (const Host::NamedValue& property : instance.properties()) {
         if (property.value.isNull())
             continue;
         const std::string_view name = *property.name->text();
         text.append(margin, ' ').append(name).append(column - margin - name.size(), ' ');
-        text += flow(itemsOf(sensor, name, property.value, style.isUtf8), column, style.width) + "\n";
+        text +=
+            flow(itemsOf(sensor, name, property.value, style.isUtf8), column, style.width) + "\n";
     }
     return text;
 }

@@ -32,9 +32,8 @@ void writeCsv(Output& out, const Sensors& sensors)
     out.write(titles + ",deviceId\n");
     for (const Sensor& sensor : sensors) {
         std::string line;
-        for (const std::string_view field :
-            {std::string_view(sensor.chip), std::string_view(sensor.device),
-                std::string_view(sensor.label), sensor.kind})
+        for (const std::string_view field : {std::string_view(sensor.chip),
+                 std::string_view(sensor.device), std::string_view(sensor.label), sensor.kind})
             appendField(line, field);
         appendField(line, sensor.reading ? sensor.reading->text() : "");
         appendField(line, sensor.unit);

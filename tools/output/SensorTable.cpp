@@ -81,8 +81,8 @@ private:
             columns.push_back({"CHIP"});
         columns.insert(columns.end(), {{"READING", right}, {"", left, 1}, {"STATE"}});
         if (layout == Layout::limitPairs)
-            columns.insert(columns.end(),
-                {{pairTitle(0, limits_)}, {pairTitle(firstUpperLimit, limits_)}});
+            columns.insert(
+                columns.end(), {{pairTitle(0, limits_)}, {pairTitle(firstUpperLimit, limits_)}});
         for (std::size_t i = 0; i < limits_.size() && layout < Layout::limitPairs; ++i)
             if (limits_[i])
                 columns.push_back({limitKinds.at(i).title, right});
@@ -96,11 +96,10 @@ private:
         std::vector<Cell> cells = {{(isGrouped_ ? "  " : "") + shown(sensor.label)}};
         if (!isGrouped_)
             cells.push_back({shown(sensor.chip)});
-        cells.insert(cells.end(),
-            {readingCell(sensor), unitCell(sensor, style_), stateCell(sensor)});
+        cells.insert(
+            cells.end(), {readingCell(sensor), unitCell(sensor, style_), stateCell(sensor)});
         if (layout == Layout::limitPairs)
-            cells.insert(
-                cells.end(), {{pairText(sensor, 0)}, {pairText(sensor, firstUpperLimit)}});
+            cells.insert(cells.end(), {{pairText(sensor, 0)}, {pairText(sensor, firstUpperLimit)}});
         for (std::size_t i = 0; i < limits_.size() && layout < Layout::limitPairs; ++i)
             if (limits_[i])
                 cells.push_back({limitText(sensor.limits.at(i))});

@@ -11,8 +11,10 @@
 #include <cstdio>
 #include <filesystem>
 #include <fstream>
+#include <map>
 #include <memory>
 #include <optional>
+#include <set>
 #include <string_view>
 #include <vector>
 
@@ -34,6 +36,7 @@ std::string lineIn(const std::string& file)
     return std::string(Text::trimmed(line));
 }
 
+// Returns the names in a folder, in the kernel's order; none when it cannot be read.
 std::vector<std::string> entriesOf(const std::string& folder)
 {
     std::vector<std::string> names;
@@ -43,7 +46,6 @@ std::vector<std::string> entriesOf(const std::string& folder)
     while (const dirent* const entry = ::readdir(directory.get()))
         if (entry->d_name[0] != '.')
             names.emplace_back(entry->d_name);
-    std::sort(names.begin(), names.end());
     return names;
 }
 
@@ -56,7 +58,7 @@ std::string formatted(const char* format, Numbers... numbers)
 }
 
 // Returns what libsensors appends to the names of chips with that device, which the kernel names by
-// its address on a SCSI, PCI or I2C bus. Returns nothing for other names.
+// its address on a SCSI or PCI bus. Returns nothing for other names.
 std::optional<std::string> addressIn(const std::string& device)
 {
     unsigned first = 0;
@@ -64,17 +66,15 @@ std::optional<std::string> addressIn(const std::string& device)
     unsigned third = 0;
     unsigned fourth = 0;
     int end = 0;
-    const auto isRead = [&](int count, int expected) {
-        return count == expected && static_cast<std::size_t>(end) == device.size();
+    const auto isWhole = [&](int count) {
+        return count == 4 && static_cast<std::size_t>(end) == device.size();
     };
     const char* const text = device.c_str();
     // NOLINTBEGIN(cert-err34-c): the kernel's names have no numbers that overflow
-    if (isRead(std::sscanf(text, "%u:%u:%u:%x%n", &first, &second, &third, &fourth, &end), 4))
+    if (isWhole(std::sscanf(text, "%u:%u:%u:%x%n", &first, &second, &third, &fourth, &end)))
         return formatted("-scsi-%u-%x", first, (second << 8U) + (third << 4U) + fourth);
-    if (isRead(std::sscanf(text, "%x:%2x:%2x.%1x%n", &first, &second, &third, &fourth, &end), 4))
+    if (isWhole(std::sscanf(text, "%x:%2x:%2x.%1x%n", &first, &second, &third, &fourth, &end)))
         return formatted("-pci-%04x", (first << 16U) + (second << 8U) + (third << 3U) + fourth);
-    if (isRead(std::sscanf(text, "%u-%4x%n", &first, &second, &end), 2))
-        return formatted("-i2c-%u-%02x", first, second);
     // NOLINTEND(cert-err34-c)
     return std::nullopt;
 }
@@ -100,32 +100,50 @@ std::string deviceIn(const std::string& folder, const std::string& address)
     return slotOf(address);
 }
 
-} // namespace
-
-ChipDevices::ChipDevices()
+// Adds the device of the chip in the folder to those by the name of the chip.
+void addDevice(
+    std::map<std::string, std::string>& devices, const std::string& folder, const std::string& name)
 {
-    for (const std::string& entry : entriesOf(hwmonFolder))
-        read(std::string(hwmonFolder).append("/").append(entry));
-}
-
-void ChipDevices::read(const std::string& folder)
-{
-    countChannels(folder);
+    const std::string device = folder + "/device";
     std::error_code failure;
-    const Files::path real = Files::canonical(folder + "/device", failure);
+    const Files::path real = Files::canonical(device, failure);
     if (failure)
         return;
-    // A disk's controller or an interface's class device may stand between the chip and its
-    // address.
-    for (Files::path place = real; place.has_relative_path(); place = place.parent_path())
-        if (const auto address = addressIn(place.filename().string())) {
-            const std::string device = deviceIn(folder + "/device", place.filename().string());
-            devices_.emplace(lineIn(folder + "/name") + *address, device);
+    // A class device, such as that of a controller, may stand between the chip and its address.
+    for (Files::path place = real; place.has_relative_path(); place = place.parent_path()) {
+        const std::string address = place.filename().string();
+        if (const auto suffix = addressIn(address)) {
+            devices.emplace(name + *suffix, deviceIn(device, address));
             return;
         }
+    }
+    devices.emplace(name + "-acpi-0", deviceIn(device, ""));
 }
 
-void ChipDevices::countChannels(const std::string& folder)
+} // namespace
+
+void nameDevices(Sensors& sensors)
+{
+    constexpr std::array<std::string_view, 3> buses = {"-scsi-", "-pci-", "-acpi-"};
+    std::set<std::string> named; // the beginnings of names of chips that may have a device
+    for (const Sensor& sensor : sensors)
+        for (const std::string_view bus : buses)
+            if (const auto end = sensor.chip.rfind(bus); end != std::string::npos)
+                named.insert(sensor.chip.substr(0, end));
+    if (named.empty())
+        return;
+    std::map<std::string, std::string> devices;
+    for (const std::string& entry : entriesOf(hwmonFolder)) {
+        const std::string folder = std::string(hwmonFolder).append("/").append(entry);
+        if (const std::string name = lineIn(folder + "/name"); named.contains(name))
+            addDevice(devices, folder, name);
+    }
+    for (Sensor& sensor : sensors)
+        if (const auto device = devices.find(sensor.chip); device != devices.end())
+            sensor.device = device->second;
+}
+
+std::string otherChannels()
 {
     // The attributes that each channel of a kind has.
     struct OtherKind {
@@ -133,37 +151,27 @@ void ChipDevices::countChannels(const std::string& folder)
         std::string_view suffix;
         const char* kind;
     };
-    constexpr std::array kinds = {OtherKind{"curr", "_input", "current"},
+    constexpr std::array otherKinds = {OtherKind{"curr", "_input", "current"},
         OtherKind{"power", "_input", "power"}, OtherKind{"power", "_average", "power"},
         OtherKind{"energy", "_input", "energy"}, OtherKind{"humidity", "_input", "humidity"},
         OtherKind{"intrusion", "_alarm", "intrusion"}};
     std::set<std::string> channels;
-    for (const std::string& name : entriesOf(folder))
-        for (const OtherKind& each : kinds)
-            if (name.starts_with(each.attribute) && name.ends_with(each.suffix)) {
-                channels.insert(name.substr(0, name.size() - each.suffix.size()));
-                otherKinds_.insert(each.kind);
-            }
-    otherChannels_ += channels.size();
-}
-
-void ChipDevices::nameIn(Sensors& sensors) const
-{
-    for (Sensor& sensor : sensors)
-        if (const auto device = devices_.find(sensor.chip); device != devices_.end())
-            sensor.device = device->second;
-}
-
-std::string ChipDevices::otherChannels() const
-{
-    if (otherChannels_ == 0)
+    std::set<std::string> kinds;
+    for (const std::string& chip : entriesOf(hwmonFolder))
+        for (const std::string& name : entriesOf(std::string(hwmonFolder).append("/").append(chip)))
+            for (const OtherKind& each : otherKinds)
+                if (name.starts_with(each.attribute) && name.ends_with(each.suffix)) {
+                    channels.insert(chip + name.substr(0, name.size() - each.suffix.size()));
+                    kinds.insert(each.kind);
+                }
+    if (channels.empty())
         return "";
-    std::string kinds;
-    for (const std::string& kind : otherKinds_)
-        kinds.append(kinds.empty() ? "" : ", ").append(kind);
-    return std::to_string(otherChannels_) +
-           (otherChannels_ == 1 ? " channel of another kind is" : " channels of other kinds are") +
-           " not shown (" + kinds + ").";
+    std::string list;
+    for (const std::string& kind : kinds)
+        list.append(list.empty() ? "" : ", ").append(kind);
+    return std::to_string(channels.size()) +
+           (channels.size() == 1 ? " channel of another kind is" : " channels of other kinds are") +
+           " not shown (" + list + ").";
 }
 
 } // namespace Tools

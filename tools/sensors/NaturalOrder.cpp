@@ -27,26 +27,26 @@ std::string_view takeNumber(std::string_view& text)
 
 } // namespace
 
-bool isBefore(std::string_view first, std::string_view second)
+std::weak_ordering compareNaturally(std::string_view first, std::string_view second)
 {
     while (!first.empty() && !second.empty()) {
         if (isDigit(first.front()) && isDigit(second.front())) {
             const std::string_view left = takeNumber(first);
             const std::string_view right = takeNumber(second);
-            if (left.size() != right.size())
-                return left.size() < right.size();
-            if (left != right)
-                return left < right;
+            if (const auto order = left.size() <=> right.size(); order != 0)
+                return order;
+            if (const auto order = left <=> right; order != 0)
+                return order;
             continue;
         }
         const auto left = static_cast<unsigned char>(Host::foldCase(first.front()));
         const auto right = static_cast<unsigned char>(Host::foldCase(second.front()));
-        if (left != right)
-            return left < right;
+        if (const auto order = left <=> right; order != 0)
+            return order;
         first.remove_prefix(1);
         second.remove_prefix(1);
     }
-    return first.empty() && !second.empty();
+    return first.size() <=> second.size();
 }
 
 } // namespace Tools

@@ -4,12 +4,13 @@
 
 #pragma once
 
+#include <compare>
 #include <string_view>
 
 namespace Tools {
 
-// Returns whether the first text comes before the second: "temp2" before "temp10", without regard
-// to the case of ASCII letters.
-bool isBefore(std::string_view first, std::string_view second);
+// Compares texts so that "temp2" comes before "temp10", without regard to the case of ASCII
+// letters.
+std::weak_ordering compareNaturally(std::string_view first, std::string_view second);
 
 } // namespace Tools

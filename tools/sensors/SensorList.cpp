@@ -13,16 +13,24 @@ namespace Tools {
 
 namespace {
 
-bool isListedBefore(const Sensor& first, const Sensor& second)
+// Sorts pointers, since a sensor is large.
+void sort(Sensors& sensors)
 {
-    for (const auto& [left, right] : {std::pair(&first.chip, &second.chip),
-             {&first.label, &second.label}, {&first.path, &second.path}}) {
-        if (isBefore(*left, *right))
-            return true;
-        if (isBefore(*right, *left))
-            return false;
-    }
-    return false;
+    std::vector<Sensor*> order;
+    for (Sensor& sensor : sensors)
+        order.push_back(&sensor);
+    std::sort(order.begin(), order.end(), [](const Sensor* first, const Sensor* second) {
+        for (const auto& [left, right] : {std::pair(&first->chip, &second->chip),
+                 {&first->label, &second->label}, {&first->path, &second->path}})
+            if (const auto comparison = compareNaturally(*left, *right); comparison != 0)
+                return comparison < 0;
+        return first->deviceId < second->deviceId;
+    });
+    Sensors sorted;
+    sorted.reserve(order.size());
+    for (Sensor* const sensor : order)
+        sorted.push_back(std::move(*sensor));
+    sensors = std::move(sorted);
 }
 
 std::vector<const char*> propertiesOfSensors()
@@ -40,11 +48,13 @@ std::vector<const char*> propertiesOfSensors()
 Sensors readSensors(ProviderClient& provider, bool isWhole)
 {
     std::vector<const char*> properties = propertiesOfSensors();
+    const Instances instances =
+        provider.instances(sensorClass, isWhole ? nullptr : properties.data());
     Sensors sensors;
-    for (const Host::Instance* const each :
-        provider.instances(sensorClass, isWhole ? nullptr : properties.data()))
+    sensors.reserve(instances.size());
+    for (const Host::Instance* const each : instances)
         sensors.emplace_back(*each);
-    std::stable_sort(sensors.begin(), sensors.end(), isListedBefore);
+    sort(sensors);
     return sensors;
 }
 
@@ -60,7 +70,7 @@ Sensors sensorsInFile(const std::string& file)
             sensor.setNames(node.description, node.path);
             sensor.kind = kind;
         }
-    std::stable_sort(sensors.begin(), sensors.end(), isListedBefore);
+    sort(sensors);
     return sensors;
 }
 

@@ -17,8 +17,8 @@ struct SensorState {
     Severity severity = Severity::unknown;
 };
 
-// Returns the state with that CurrentState; where this is empty or "Unknown", the one with a code of
-// OperationalStatus. Returns the state "Unknown" for all others.
+// Returns the state with that CurrentState; where this is empty or "Unknown", the one with a code
+// of OperationalStatus. Returns the state "Unknown" for all others.
 SensorState stateOf(std::string_view currentState, std::span<const unsigned> statuses);
 
 // Returns whether a person should look at the sensor.
