@@ -2,6 +2,8 @@
 
 #include "tools/Command.h"
 
+#include "tools/output/Output.h"
+
 #include <CLI/CLI.hpp>
 
 namespace Tools {
@@ -9,6 +11,12 @@ namespace Tools {
 Command::Command(CLI::App& tool, const char* name, const char* description)
     : parser_(tool.add_subcommand(name, description))
 {
+}
+
+ExitCode Command::reportFailure(Output& /*out*/, const std::string& reason, ExitCode code) const
+{
+    complain(reason);
+    return code;
 }
 
 bool Command::isChosen() const

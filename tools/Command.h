@@ -4,6 +4,8 @@
 
 #pragma once
 
+#include <string>
+
 namespace CLI {
 class App;
 }
@@ -33,6 +35,10 @@ public:
     // Throws UsageError for an invalid command line and another std::exception for any other
     // failure, with a text for the user.
     virtual ExitCode run(Output& out) = 0;
+
+    // Reports why the command line is invalid or run() failed. Returns the exit code of the process:
+    // the given one unless the command has other conventions.
+    virtual ExitCode reportFailure(Output& out, const std::string& reason, ExitCode code) const;
 
 protected:
     CLI::App& parser() const { return *parser_; }

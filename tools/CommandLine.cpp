@@ -45,29 +45,31 @@ Commands addCommands(CLI::App& tool)
     commands.push_back(makeListCommand(tool));
     commands.push_back(makeGetCommand(tool));
     commands.push_back(makeWalkCommand(tool));
+    commands.push_back(makeCheckCommand(tool));
     commands.push_back(makeRecordCommand(tool));
     commands.push_back(makeServeCommand(tool));
     return commands;
 }
 
-ExitCode refuse(const CLI::App& tool, const std::string& reason)
-{
-    std::string command = "sensorctl";
-    for (const CLI::App* const chosen : tool.get_subcommands())
-        command += " " + chosen->get_name();
-    complain(reason + " (" + command + " --help says what is possible)");
-    return ExitCode::wrongUsage;
-}
-
-ExitCode runChosen(const CLI::App& tool, const Commands& commands, Output& out)
+// Returns null when the command line names no command.
+Command* chosenOf(const Commands& commands)
 {
     const auto chosen = std::find_if(commands.begin(), commands.end(),
         [](const std::unique_ptr<Command>& command) { return command->isChosen(); });
-    if (chosen == commands.end())
-        return refuse(tool, "a command is missing");
-    const ExitCode code = (*chosen)->run(out);
-    out.flush();
-    return code;
+    return chosen == commands.end() ? nullptr : chosen->get();
+}
+
+ExitCode refuse(
+    const CLI::App& tool, const Command* command, Output& out, const std::string& reason)
+{
+    std::string words = "sensorctl";
+    for (const CLI::App* const chosen : tool.get_subcommands())
+        words += " " + chosen->get_name();
+    const std::string text = reason + " (" + words + " --help says what is possible)";
+    if (command != nullptr)
+        return command->reportFailure(out, text, ExitCode::wrongUsage);
+    complain(text);
+    return ExitCode::wrongUsage;
 }
 
 ExitCode print(Output& out, const std::string& text)
@@ -95,12 +97,19 @@ ExitCode run(int argc, const char* const* argv)
     } catch (const CLI::CallForVersion& version) {
         return print(out, version.what() + std::string("\n"));
     } catch (const CLI::ParseError& error) {
-        return refuse(tool, error.what());
+        return refuse(tool, chosenOf(commands), out, error.what());
     }
+    Command* const command = chosenOf(commands);
+    if (command == nullptr)
+        return refuse(tool, nullptr, out, "a command is missing");
     try {
-        return runChosen(tool, commands, out);
+        const ExitCode code = command->run(out);
+        out.flush();
+        return code;
     } catch (const UsageError& error) {
-        return refuse(tool, error.what());
+        return refuse(tool, command, out, error.what());
+    } catch (const std::exception& error) {
+        return command->reportFailure(out, error.what(), ExitCode::failure);
     }
 }
 

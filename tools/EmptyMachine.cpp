@@ -66,8 +66,8 @@ ExitCode complainOfEmptyMachine(const std::optional<std::string>& model)
     return ExitCode::nothingFound;
 }
 
-ExitCode complainOfNoObject(const ObjectFound& found, const std::string& command,
-    const std::optional<std::string>& model)
+ExitCode complainOfNoObject(
+    const ObjectFound& found, const std::string& command, const std::optional<std::string>& model)
 {
     if (found.isMachineEmpty) {
         checkMachineIsEmpty();
@@ -76,8 +76,8 @@ ExitCode complainOfNoObject(const ObjectFound& found, const std::string& command
     const std::string start = "sensorctl " + command + (model ? " --model " + quoted(*model) : "");
     std::vector<std::string> lines;
     for (const Sensor& sensor : found.choices)
-        lines.push_back(start + (sensor.deviceId.starts_with('-') ? " -- " : " ") +
-                        quoted(sensor.deviceId));
+        lines.push_back(
+            start + (sensor.deviceId.starts_with('-') ? " -- " : " ") + quoted(sensor.deviceId));
     complain(found.complaint, lines);
     return lines.empty() ? ExitCode::nothingFound : ExitCode::failure;
 }

@@ -23,7 +23,7 @@ TEST(UsageTest, HelpGoesToStandardOutput)
 
 TEST(UsageTest, EveryCommandHasItsHelp)
 {
-    for (const char* const command : {"list", "get", "walk", "record", "serve"}) {
+    for (const char* const command : {"list", "get", "walk", "check", "record", "serve"}) {
         const Ended ended = run({command, "--help"});
         EXPECT_EQ(ended.code, 0);
         EXPECT_THAT(ended.out, HasSubstr(std::string("sensorctl ") + command));
@@ -34,7 +34,7 @@ TEST(UsageTest, HelpFitsIntoEightyColumns)
 {
     for (const std::vector<std::string>& arguments :
         std::vector<std::vector<std::string>>{{"--help"}, {"list", "--help"}, {"get", "--help"},
-            {"walk", "--help"}, {"record", "--help"}, {"serve", "--help"}})
+            {"walk", "--help"}, {"check", "--help"}, {"record", "--help"}, {"serve", "--help"}})
         for (const std::string& line : linesOf(run(arguments).out))
             EXPECT_LE(line.size(), 80U) << line;
 }

@@ -87,7 +87,9 @@ std::optional<Quantity> quantityIn(
 
 double Quantity::number() const
 {
-    return static_cast<double>(value) * std::pow(10, modifier);
+    // The quotient is the double nearest to the decimal number, which a product may miss.
+    return modifier < 0 ? static_cast<double>(value) / std::pow(10, -modifier)
+                        : static_cast<double>(value) * std::pow(10, modifier);
 }
 
 std::string Quantity::text() const

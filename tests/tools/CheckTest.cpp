@@ -1,0 +1,152 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// The lines and exit codes of `check`.
+
+#include "tests/tools/ToolTest.h"
+
+#include <gmock/gmock.h>
+
+#include <regex>
+
+namespace {
+
+using testing::EndsWith;
+using testing::HasSubstr;
+using testing::Not;
+using testing::StartsWith;
+using namespace Testing;
+
+class CheckTest : public ToolTest {
+protected:
+    Ended checkedFile(const std::string& file, std::vector<std::string> more = {}) const
+    {
+        more.insert(more.begin(), {"check", "--model", file});
+        Ended ended = run(more);
+        EXPECT_EQ(ended.err, "");
+        EXPECT_EQ(linesOf(ended.out).size(), 1U) << ended.out;
+        return ended;
+    }
+
+    Ended checked(const std::vector<std::string>& more = {}) const
+    {
+        return checkedFile(smallModel(), more);
+    }
+};
+
+TEST_F(CheckTest, WorstSensorDecidesAndComesFirst)
+{
+    const Ended ended = checked();
+    EXPECT_EQ(ended.code, 2);
+    EXPECT_EQ(ended.out,
+        "SENSORS CRITICAL - cpu1/CPU 2: Critical high (97 C), board/+12V: Warning high (12.75 V), "
+        "board/fan2: Lost - 5 sensors: 2 normal, 1 warning, 1 critical, 1 lost. | "
+        "'board/+12V'=12.75V;12.5;10.5: 'board/Fan'=1200;300:; 'cpu0/CPU 1'=41C;5:80;95 "
+        "'cpu1/CPU 2'=97C;;95\n");
+}
+
+TEST_F(CheckTest, ExitCodeFollowsTheStates)
+{
+    EXPECT_EQ(checked({"cpu0"}).code, 0);
+    EXPECT_EQ(
+        checked({"cpu0"}).out, "SENSORS OK - 1 sensor: 1 normal. | 'cpu0/CPU 1'=41C;5:80;95\n");
+    EXPECT_EQ(checked({"fan2"}).code, 1);
+    EXPECT_EQ(checked({"fan2"}).out, "SENSORS WARNING - board/Fan: Lost - 1 sensor: 1 lost.\n");
+    EXPECT_EQ(checked({"--kind", "voltage"}).code, 1);
+    EXPECT_EQ(checked({"--kind", "temperature"}).code, 2);
+}
+
+TEST_F(CheckTest, PerformanceDataHasTheFormOfPlugins)
+{
+    const std::string file = model(R"(
+        { "type": "voltage", "path": "/a/1", "description": "it's | a=b; \u00fc", "status": 1,
+          "baseUnits": 5, "reading": -1.5, "lowerNonCritical": -2, "upperNonCritical": 3 })");
+    const Ended ended = checkedFile(file);
+    EXPECT_THAT(ended.out, EndsWith(" | 'a/it_s _ a_b; ü'=-1.5V;-2:3;\n"));
+    static const std::regex form("SENSORS [A-Z]+ - [^|]*( \\|( '[^'=|]+'=[-0-9.]+[A-Z]?;[-0-9.:~]*;"
+                                 "[-0-9.:~]*)+)?\n");
+    for (const std::string& out : {ended.out, checked().out,
+             checkedFile(SENSOR_PROFILE_SOURCE_DIR "/schema/demo-model.json").out})
+        EXPECT_TRUE(std::regex_match(out, form)) << out;
+}
+
+TEST_F(CheckTest, RangesReplaceTheSensorsOwnLimits)
+{
+    EXPECT_EQ(checked({"cpu0", "--warning", "CPU*=40"}).out,
+        "SENSORS WARNING - cpu0/CPU 1: 41 C is beyond 40 - 1 sensor: 1 normal. | "
+        "'cpu0/CPU 1'=41C;40;95\n");
+    EXPECT_EQ(checked({"cpu0", "--critical", "CPU*=50:"}).code, 2);
+    EXPECT_EQ(checked({"cpu0", "--warning", "CPU*=40", "--warning", "cpu 1=41"}).code, 0);
+    EXPECT_EQ(checked({"in1", "--warning", "+12V=12.75"}).code, 0);
+    EXPECT_EQ(checked({"in1", "--warning", "+12V=12.749"}).code, 1);
+    EXPECT_EQ(checked({"cpu1", "--critical", "cpu1=100"}).code, 1); // still above its own limits
+    EXPECT_EQ(checked({"cpu1", "--critical", "cpu1=100", "--warning", "cpu1=100"}).code, 0);
+    EXPECT_EQ(checked({"fan2", "--warning", "fan=100:", "--critical", "fan=50:"}).code, 1);
+}
+
+TEST_F(CheckTest, WhatIsMissingFromTheExpectedMachineIsCritical)
+{
+    const std::string expected = folder_.write("expected.json", contentOf(smallModel()));
+    EXPECT_EQ(checked({"cpu0", "--expect", expected}).code, 0);
+    const std::string file = model(R"(
+        { "type": "tachometer", "path": "/board/fan1", "description": "Renamed", "status": 1 },
+        { "type": "voltage", "path": "/board/in1", "description": "+12V", "status": 1 },
+        { "type": "voltage", "path": "/new/in1", "description": "New", "status": 1 })");
+    const auto missing = [&](const std::vector<std::string>& more) {
+        std::vector<std::string> arguments = {"check", "--model", file, "--expect", expected};
+        arguments.insert(arguments.end(), more.begin(), more.end());
+        return run(arguments);
+    };
+    EXPECT_EQ(missing({}).code, 2);
+    EXPECT_THAT(
+        missing({}).out, StartsWith("SENSORS CRITICAL - /board/fan2 is missing, chip cpu0 is "
+                                    "missing, chip cpu1 is missing - 3 sensors: 3 normal."));
+    EXPECT_EQ(missing({"/board/*1"}).code, 0);
+    EXPECT_EQ(missing({"cpu0"}).code, 2);
+    EXPECT_THAT(missing({"cpu0"}).out, HasSubstr("chip cpu0 is missing, no sensor matches"));
+}
+
+TEST_F(CheckTest, ManyProblemsAreCounted)
+{
+    std::string nodes;
+    for (int i = 1; i <= 12; ++i)
+        nodes += std::string(i == 1 ? "" : ",") +
+                 R"({ "type": "voltage", "status": 13, "path": "/)" + std::to_string(i) +
+                 R"(", "description": "V)" + std::to_string(i) + R"(" })";
+    EXPECT_THAT(
+        checkedFile(model(nodes)).out, HasSubstr("//V8: Lost, 4 more problems - 12 sensors"));
+}
+
+TEST_F(CheckTest, WhatCannotBeJudgedIsUnknown)
+{
+    const std::vector<std::pair<std::vector<std::string>, std::string>> cases = {
+        {{"--model", smallModel(), "nothing"}, "no sensor matches \"nothing\"\n"},
+        {{"--model", smallModel(), "cpu0", "--warning", "x=1"},
+            "no sensor matches \"x\" - 1 sensor"},
+        {{"--model", smallModel(), "--warning", "cpu0"}, "\"cpu0\" is not SELECTOR=RANGE ("},
+        {{"--model", smallModel(), "--critical", "cpu0=hot"}, "\"hot\" is no range such as 10:80"},
+        {{"--model", smallModel(), "--critical", "cpu0=5:4"}, "\"5:4\" begins above its end"},
+        {{"--nonsense"}, "The following argument was not expected: --nonsense ("},
+        {{"--model", "/no/such/file"}, "model file /no/such/file: No such file or directory\n"},
+        {{"--model", smallModel(), "--expect", "/none"}, "model file /none: No such file"}};
+    for (const auto& [arguments, reason] : cases) {
+        std::vector<std::string> all = arguments;
+        all.insert(all.begin(), "check");
+        const Ended ended = run(all);
+        EXPECT_EQ(ended.code, 3) << reason;
+        EXPECT_THAT(ended.out, StartsWith("SENSORS UNKNOWN - " + reason));
+        EXPECT_EQ(ended.err, "");
+    }
+    const Ended empty = run({"check", "--model", model("")});
+    EXPECT_EQ(empty.code, 3);
+    EXPECT_EQ(empty.out, "SENSORS UNKNOWN - this machine has no sensors\n");
+}
+
+TEST_F(CheckTest, OutputThatCannotBeWrittenIsUnknown)
+{
+    const Ended ended = run({"check", "--model", smallModel(), "cpu0"},
+        {.out = RunOptions::Out::file, .outFile = "/dev/full"});
+    EXPECT_EQ(ended.code, 3);
+    EXPECT_THAT(ended.err, HasSubstr("No space left on device"));
+}
+
+} // namespace

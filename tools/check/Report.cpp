@@ -1,0 +1,173 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "tools/check/Report.h"
+
+#include "tools/output/SensorCells.h"
+#include "tools/output/Utf8.h"
+#include "tools/sensors/Selector.h"
+
+#include <algorithm>
+#include <array>
+#include <set>
+
+namespace Tools {
+
+namespace {
+
+constexpr std::size_t shownProblems = 8; // in one line
+
+const Range* findRange(const std::vector<Override>& overrides, const Sensor& sensor)
+{
+    const auto found = std::find_if(overrides.rbegin(), overrides.rend(),
+        [&](const Override& each) { return selects(each.selector, sensor); });
+    return found == overrides.rend() ? nullptr : &found->range;
+}
+
+// Returns the limits as a range; an empty text when there are none.
+std::string rangeText(const std::optional<Quantity>& low, const std::optional<Quantity>& high)
+{
+    if (!low)
+        return high ? high->text() : "";
+    return low->text() + ":" + (high ? high->text() : "");
+}
+
+// Returns the unit of performance data. Revolutions have none.
+std::string unitOfMeasurement(const Sensor& sensor)
+{
+    if (sensor.unit == "RPM")
+        return "";
+    return printable(sensor.unit, false);
+}
+
+// The status of a sensor, and what decided it.
+struct Verdict {
+    CheckStatus status = CheckStatus::ok;
+    const Range* range = nullptr; // null when the sensor's own state decided
+};
+
+Verdict verdictOn(const Sensor& sensor, const Range* warning, const Range* critical)
+{
+    const auto isBeyond = [&](const Range* range) {
+        return range != nullptr && sensor.reading && range->raisesAlert(sensor.reading->number());
+    };
+    if (isBeyond(critical))
+        return {CheckStatus::critical, critical};
+    const bool hasReading = sensor.reading.has_value();
+    if (sensor.state.severity == Severity::critical && (critical == nullptr || !hasReading))
+        return {CheckStatus::critical};
+    if (isBeyond(warning))
+        return {CheckStatus::warning, warning};
+    if (isProblem(sensor.state.severity) && (warning == nullptr || !hasReading))
+        return {CheckStatus::warning};
+    return {};
+}
+
+// A bar begins the performance data; Nagios replaces semicolons.
+std::string withoutReserved(std::string text)
+{
+    std::replace(text.begin(), text.end(), '|', '/');
+    std::replace(text.begin(), text.end(), ';', ',');
+    return text;
+}
+
+std::string performanceName(std::string name)
+{
+    for (const char reserved : {'\'', '=', '|'})
+        std::replace(name.begin(), name.end(), reserved, '_');
+    return "'" + printable(name) + "'";
+}
+
+// By importance: unknown is less than warning.
+int rankOf(CheckStatus status)
+{
+    constexpr std::array ranks = {0, 2, 3, 1};
+    return ranks.at(static_cast<std::size_t>(status));
+}
+
+} // namespace
+
+void Report::add(CheckStatus status, std::string problem)
+{
+    problems_.push_back({status, std::move(problem)});
+}
+
+void Report::add(const Sensor& sensor, const std::string& name, const Overrides& overrides)
+{
+    const Range* const warning = findRange(overrides.warning, sensor);
+    const Range* const critical = findRange(overrides.critical, sensor);
+    const Verdict verdict = verdictOn(sensor, warning, critical);
+    const std::string reading = textWithUnit(sensor.reading, sensor);
+    if (verdict.range != nullptr)
+        add(verdict.status, name + ": " + reading + " is beyond " + verdict.range->text);
+    else if (verdict.status != CheckStatus::ok)
+        add(verdict.status, name + ": " + std::string(sensor.state.word) +
+                                (sensor.reading ? " (" + reading + ")" : ""));
+    if (!sensor.reading)
+        return;
+    const auto& limits = sensor.limits;
+    performance_ += " " + performanceName(name) + "=" + sensor.reading->text() +
+                    unitOfMeasurement(sensor) + ";" +
+                    (warning != nullptr ? warning->text : rangeText(limits[0], limits[3])) + ";" +
+                    (critical != nullptr ? critical->text : rangeText(limits[1], limits[4]));
+}
+
+CheckStatus Report::status() const
+{
+    CheckStatus worst = CheckStatus::ok;
+    for (const Problem& problem : problems_)
+        if (rankOf(problem.status) > rankOf(worst))
+            worst = problem.status;
+    return worst;
+}
+
+std::string Report::toText(const std::string& summary, bool isUtf8) const
+{
+    constexpr std::array words = {"OK", "WARNING", "CRITICAL", "UNKNOWN"};
+    std::vector<Problem> problems = problems_;
+    std::stable_sort(
+        problems.begin(), problems.end(), [](const Problem& one, const Problem& other) {
+            return rankOf(one.status) > rankOf(other.status);
+        });
+    std::string text;
+    for (std::size_t i = 0; i < std::min(problems.size(), shownProblems); ++i)
+        text += (text.empty() ? "" : ", ") + problems[i].text;
+    if (problems.size() > shownProblems)
+        text += ", " + std::to_string(problems.size() - shownProblems) + " more problems";
+    if (!summary.empty())
+        text += (text.empty() ? "" : " - ") + summary;
+    text = withoutReserved(text);
+    return std::string("SENSORS ") + words.at(static_cast<std::size_t>(status())) + " - " +
+           printable(text, isUtf8) + (performance_.empty() ? "" : " |" + performance_) + "\n";
+}
+
+void addSensors(Report& report, const Sensors& sensors, const Overrides& overrides)
+{
+    std::set<std::string> names;
+    for (const Sensor& sensor : sensors) {
+        std::string name = sensor.chip + "/" + sensor.label;
+        if (!names.insert(name).second)
+            name = sensor.chip + "/" + sensor.feature;
+        report.add(sensor, name, overrides);
+    }
+}
+
+void addMissing(Report& report, const Sensors& expected, const Sensors& present)
+{
+    std::set<std::string> chips;
+    std::set<std::string> paths;
+    for (const Sensor& sensor : present) {
+        chips.insert(sensor.chip);
+        paths.insert(sensor.path);
+    }
+    std::set<std::string> missingChips;
+    for (const Sensor& sensor : expected) {
+        if (paths.contains(sensor.path))
+            continue;
+        if (chips.contains(sensor.chip))
+            report.add(CheckStatus::critical, sensor.path + " is missing");
+        else if (missingChips.insert(sensor.chip).second)
+            report.add(CheckStatus::critical, "chip " + sensor.chip + " is missing");
+    }
+}
+
+} // namespace Tools
