@@ -14,8 +14,8 @@
 #include <algorithm>
 #include <array>
 #include <cstdlib>
-#include <iterator>
 #include <memory>
+#include <stdexcept>
 #include <utility>
 
 namespace Vorn::Hwmon {
@@ -72,7 +72,7 @@ std::string descriptionOf(const sensors_chip_name& chip, const sensors_feature& 
 }
 
 std::vector<Attribute> attributesOf(
-    const sensors_chip_name& chip, const sensors_feature& feature, bool mayBeComputed)
+    int folder, const sensors_chip_name& chip, const sensors_feature& feature, bool mayBeComputed)
 {
     std::vector<Attribute> attributes;
     int position = 0;
@@ -87,9 +87,25 @@ std::vector<Attribute> attributesOf(
                 mayBeComputed && (found->flags & SENSORS_COMPUTE_MAPPING) != 0});
     }
     std::string enable = std::string(feature.name) + "_enable";
-    if (access((std::string(chip.path) + "/" + enable).c_str(), F_OK) == 0)
+    if (faccessat(folder, enable.c_str(), F_OK, 0) == 0)
         attributes.push_back({std::move(enable), &enableMeaning, false});
     return attributes;
+}
+
+// Returns the features of a chip without their place in the catalogue.
+std::vector<Feature> featuresOf(const NamedChip& chip, int folder, const ComputeLines& computeLines)
+{
+    const auto& [chipName, name] = chip;
+    std::vector<Feature> features;
+    int position = 0;
+    while (const sensors_feature* found = sensors_get_features(name, &position))
+        if (const auto type = nodeTypeOf(found->type)) {
+            Node node{"/hwmon/" + chipName + "/" + found->name, descriptionOf(*name, *found),
+                static_cast<unsigned>(*type)};
+            features.push_back({found->name, *type, std::move(node), 0,
+                attributesOf(folder, *name, *found, computeLines.mayApplyTo(*name, found->name))});
+        }
+    return features;
 }
 
 } // namespace
@@ -106,29 +122,29 @@ Descriptor Chip::openFolder() const
 Catalogue makeCatalogue(const ComputeLines& computeLines)
 {
     Catalogue catalogue;
-    for (const auto& [name, chip] : detectedChips()) {
-        const auto id = folderId(chip->path);
-        std::vector<Feature> features;
-        int position = 0;
-        while (const sensors_feature* feature = sensors_get_features(chip, &position)) {
-            const auto type = nodeTypeOf(feature->type);
-            if (!type)
-                continue;
-            const std::size_t token = catalogue.features.size() + features.size();
-            features.push_back({feature->name, *type,
-                {"/hwmon/" + name + "/" + feature->name, descriptionOf(*chip, *feature),
-                    static_cast<unsigned>(*type), token},
-                catalogue.chips.size(),
-                attributesOf(*chip, *feature, computeLines.mayApplyTo(*chip, feature->name))});
-        }
+    for (const NamedChip& detected : detectedChips()) {
+        const std::string path = detected.second->path;
+        const auto id = folderId(path);
+        if (!id)
+            continue;
+        Chip chip{path, *id, Descriptor()};
+        chip.folder = chip.openFolder();
+        std::vector<Feature> features = featuresOf(detected, chip.folder.number(), computeLines);
         // A chip that disappeared while its features were listed is left out, since the labels,
         // which name the sensors, may be incomplete.
-        if (features.empty() || !id || id != folderId(chip->path))
+        if (features.empty() || id != folderId(path))
             continue;
-        Chip& listed = catalogue.chips.emplace_back(Chip{chip->path, *id, Descriptor()});
-        if (catalogue.chips.size() <= maximumOpenFolders)
-            listed.folder = listed.openFolder();
-        std::move(features.begin(), features.end(), std::back_inserter(catalogue.features));
+        // They may be incomplete, too, when the process has no descriptors left.
+        if (!chip.folder.isOpen())
+            throw std::runtime_error("cannot open " + path);
+        for (Feature& feature : features) {
+            feature.chip = catalogue.chips.size();
+            feature.node.token = catalogue.features.size();
+            catalogue.features.push_back(std::move(feature));
+        }
+        if (catalogue.chips.size() >= maximumOpenFolders)
+            chip.folder = Descriptor();
+        catalogue.chips.push_back(std::move(chip));
     }
     return catalogue;
 }

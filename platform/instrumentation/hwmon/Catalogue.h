@@ -24,7 +24,7 @@ struct Chip {
     FolderId id;
     Descriptor folder; // not open past the first 256 chips
 
-    // Opens the folder for readings; not open when the chip was removed.
+    // Returns a descriptor of the folder; none when the chip was removed.
     Descriptor openFolder() const;
 };
 
@@ -50,8 +50,9 @@ struct Catalogue {
     std::vector<Feature> features; // in the order of chips, then of their drivers
 };
 
-// Lists the chips and features that libsensors knows and the administrator does not ignore.
-// REQUIRES: a lock of ChipList is held.
+// Returns the chips and features that libsensors lists and the administrator does not ignore.
+// Throws std::runtime_error naming the chip whose folder cannot be opened. REQUIRES: a lock of
+// ChipList is held.
 Catalogue makeCatalogue(const ComputeLines& computeLines);
 
 } // namespace Vorn::Hwmon

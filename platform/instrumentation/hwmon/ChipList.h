@@ -30,13 +30,13 @@ public:
     // Returns the list of this process. libsensors is released when the library is unloaded.
     static ChipList& instance();
 
-    // Returns the catalogue of the chips that are present now; where a driver adds an attribute to
-    // a chip that stays, it has it two seconds later. Throws std::runtime_error with libsensors'
-    // reason.
+    // Returns the catalogue of the chips that are present now. It has an attribute that a driver
+    // added to a chip that stays at the latest two seconds after that. Throws std::runtime_error
+    // with libsensors' reason.
     std::shared_ptr<const Catalogue> present();
 
-    // Returns the value with the `compute` line applied that libsensors has for it; nothing when it
-    // cannot be read.
+    // Returns the value of the attribute, to which libsensors applies the `compute` line; nothing
+    // when it cannot be read, or when the chip was removed.
     std::optional<double> computedValue(
         const Chip& chip, const Feature& feature, const Attribute& attribute);
 
