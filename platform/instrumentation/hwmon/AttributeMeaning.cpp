@@ -3,7 +3,7 @@
 #include "platform/instrumentation/hwmon/AttributeMeaning.h"
 
 #include <algorithm>
-#include <iterator>
+#include <array>
 #include <limits>
 
 namespace Vorn::Hwmon {
@@ -43,7 +43,7 @@ void storeAlarm(Channel& channel, std::optional<double> value)
     channel.alarms.*Alarm = isSet(value);
 }
 
-constexpr AttributeMeaning meanings[] = {
+constexpr auto meanings = std::to_array<AttributeMeaning>({
     {SENSORS_SUBFEATURE_FAN_INPUT, 1.0, storeReading},
     {SENSORS_SUBFEATURE_FAN_FAULT, 1.0, storeFault},
     {SENSORS_SUBFEATURE_FAN_MIN, 1.0, storeLimit<&Limits::min>},
@@ -77,7 +77,7 @@ constexpr AttributeMeaning meanings[] = {
     {SENSORS_SUBFEATURE_TEMP_LCRIT_ALARM, 1.0, storeAlarm<&Alarms::lcrit>},
     {SENSORS_SUBFEATURE_TEMP_CRIT_ALARM, 1.0, storeAlarm<&Alarms::crit>},
     {SENSORS_SUBFEATURE_TEMP_EMERGENCY_ALARM, 1.0, storeAlarm<&Alarms::emergency>},
-};
+});
 
 } // namespace
 
@@ -85,9 +85,9 @@ const AttributeMeaning enableMeaning{SENSORS_SUBFEATURE_UNKNOWN, 1.0, storeEnabl
 
 const AttributeMeaning* meaningOf(sensors_subfeature_type type)
 {
-    const auto* const found = std::find_if(std::begin(meanings), std::end(meanings),
+    const auto* const found = std::find_if(meanings.begin(), meanings.end(),
         [&](const AttributeMeaning& meaning) { return meaning.type == type; });
-    return found == std::end(meanings) ? nullptr : found;
+    return found == meanings.end() ? nullptr : found;
 }
 
 } // namespace Vorn::Hwmon

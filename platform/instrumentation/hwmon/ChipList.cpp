@@ -136,7 +136,7 @@ ComputeLines ChipList::initialise(const SensorsConfiguration& configuration)
     if (result != 0)
         throw std::runtime_error(
             std::string("libsensors cannot list the chips: ") + sensors_strerror(result));
-    return ComputeLines(text, !errors.list().empty());
+    return {text, !errors.list().empty()};
 }
 
 // Reports the errors that the previous call did not have: each new list of chips comes with a new
