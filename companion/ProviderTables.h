@@ -11,11 +11,27 @@
 
 #include <atomic>
 #include <exception>
+#include <stdexcept>
+#include <string>
 
 namespace Vorn::Companion {
 
 inline constexpr CMPIStatus okStatus = {CMPI_RC_OK, nullptr};
 inline constexpr CMPIStatus notSupported = {CMPI_RC_ERR_NOT_SUPPORTED, nullptr};
+
+// Ends a request with a status of this code and message.
+class RequestFailure : public std::runtime_error {
+public:
+    RequestFailure(CMPIrc code, const std::string& message)
+        : std::runtime_error(message), code_(code)
+    {
+    }
+
+    CMPIrc code() const noexcept { return code_; }
+
+private:
+    CMPIrc code_;
+};
 
 // An instance provider that only reads has these functions.
 struct InstanceReaders {
@@ -63,12 +79,15 @@ inline CMPIStatus failure(const CMPIBroker* broker, CMPIrc code, const char* mes
     return {code, isUsable(string) ? string : nullptr};
 }
 
-// Returns the status of `work`. Exceptions become a status, since CMPI has none.
+// Returns the status of `work`. Exceptions become a status, since CMPI has none: RequestFailure
+// that of its code, others CMPI_RC_ERR_FAILED.
 template <typename Work>
 CMPIStatus guarded(const CMPIBroker* broker, const Work& work)
 {
     try {
         return work();
+    } catch (const RequestFailure& error) {
+        return failure(broker, error.code(), error.what());
     } catch (const std::exception& error) {
         return failure(broker, CMPI_RC_ERR_FAILED, error.what());
     }

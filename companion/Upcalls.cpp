@@ -2,12 +2,8 @@
 
 #include "companion/Upcalls.h"
 
-#include "companion/BrokerObjects.h"
+#include "companion/ProviderTables.h"
 #include "platform/utilities/ProviderUtilities.h"
-
-#include <cmpimacs.h>
-
-#include <stdexcept>
 
 namespace Vorn::Companion {
 
@@ -18,6 +14,14 @@ bool isWithoutProvider(const CMPIStatus& status)
 {
     return status.rc == CMPI_RC_ERR_INVALID_NAMESPACE || status.rc == CMPI_RC_ERR_INVALID_CLASS ||
            status.rc == CMPI_RC_ERR_NOT_FOUND || status.rc == CMPI_RC_ERR_NOT_SUPPORTED;
+}
+
+[[noreturn]] void fail(const char* className, const CMPIStatus& status)
+{
+    std::string message = "the instances of " + std::string(className) + " cannot be enumerated";
+    if (const char* const reason = charactersOf(status.msg))
+        message.append(": ").append(reason);
+    throw RequestFailure(status.rc, message);
 }
 
 // Object managers differ in whether a path that is returned to a provider has its namespace.
@@ -35,11 +39,13 @@ template <typename Enumerate>
 std::vector<CMPIValue> Upcalls::elements(const std::string& nameSpace, const char* className,
     CMPIType type, const Enumerate& enumerate) const
 {
-    std::vector<CMPIValue> found;
-    CMPIStatus status = {CMPI_RC_OK, nullptr};
     const CMPIObjectPath* const path =
         newPathIn(broker_, nameSpace.c_str(), className, getSystemName());
-    const CMPIEnumeration* const all = path == nullptr ? nullptr : enumerate(path, &status);
+    if (path == nullptr)
+        fail(className, {CMPI_RC_ERR_FAILED, nullptr});
+    std::vector<CMPIValue> found;
+    CMPIStatus status = okStatus;
+    const CMPIEnumeration* const all = enumerate(path, &status);
     while (status.rc == CMPI_RC_OK && isUsable(all) && CMHasNext(all, &status)) {
         // The state of an element is ignored, since object managers differ in it.
         const CMPIData element = CMGetNext(all, &status);
@@ -48,20 +54,19 @@ std::vector<CMPIValue> Upcalls::elements(const std::string& nameSpace, const cha
     }
     if (isWithoutProvider(status))
         return {};
-    if (path == nullptr || status.rc != CMPI_RC_OK)
-        throw std::runtime_error(
-            "the instances of " + std::string(className) + " cannot be enumerated");
+    if (status.rc != CMPI_RC_OK)
+        fail(className, status);
     return found;
 }
 
 std::vector<CMPIObjectPath*> Upcalls::names(
     const std::string& nameSpace, const char* className) const
 {
+    const auto enumerate = [this](const CMPIObjectPath* path, CMPIStatus* status) {
+        return CBEnumInstanceNames(broker_, context_, path, status);
+    };
     std::vector<CMPIObjectPath*> paths;
-    for (const CMPIValue& element :
-        elements(nameSpace, className, CMPI_ref, [&](const CMPIObjectPath*path, CMPIStatus*status) {
-            return CBEnumInstanceNames(broker_, context_, path, status);
-        }))
+    for (const CMPIValue& element : elements(nameSpace, className, CMPI_ref, enumerate))
         if (isUsable(element.ref))
             paths.push_back(inNameSpace(element.ref, nameSpace));
     return paths;
@@ -70,11 +75,11 @@ std::vector<CMPIObjectPath*> Upcalls::names(
 std::vector<CMPIInstance*> Upcalls::instances(
     const std::string& nameSpace, const char* className, const char** properties) const
 {
+    const auto enumerate = [&](const CMPIObjectPath* path, CMPIStatus* status) {
+        return CBEnumInstances(broker_, context_, path, properties, status);
+    };
     std::vector<CMPIInstance*> all;
-    for (const CMPIValue& element : elements(nameSpace, className, CMPI_instance,
-             [&](const CMPIObjectPath*path, CMPIStatus*status) {
-                 return CBEnumInstances(broker_, context_, path, properties, status);
-             }))
+    for (const CMPIValue& element : elements(nameSpace, className, CMPI_instance, enumerate))
         if (isUsable(element.inst))
             all.push_back(element.inst);
     return all;

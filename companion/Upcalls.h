@@ -12,7 +12,8 @@
 namespace Vorn::Companion {
 
 // The functions return objects of the broker, or none where no provider serves the class in the
-// namespace. They throw std::runtime_error when the object manager fails in another way.
+// namespace. They throw RequestFailure, with the code and the message of the object manager, when
+// it fails in another way.
 class Upcalls {
 public:
     Upcalls(const CMPIBroker* broker, const CMPIContext* context)

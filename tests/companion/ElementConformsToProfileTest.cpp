@@ -232,13 +232,27 @@ TEST_F(ElementConformsToProfileTest, WithoutARegistrationNothingConforms)
 
 TEST_F(ElementConformsToProfileTest, AFailureToEnumerateTheSensorsIsReported)
 {
-    objects_.sensorFailure = CMPI_RC_ERR_FAILED;
-    for (const Reply& reply : {enumerateNames(interop), associators(profile())}) {
-        EXPECT_EQ(reply.status.rc, CMPI_RC_ERR_FAILED);
-        EXPECT_EQ(Testing::textOf(reply.status.msg),
-            "the instances of ZUMLO_NumericSensor cannot be enumerated");
-        EXPECT_FALSE(reply.found.isDone());
+    for (const CMPIrc code : {CMPI_RC_ERR_FAILED, CMPI_RC_ERR_ACCESS_DENIED}) {
+        objects_.sensorFailure = code;
+        for (const Reply& reply : {enumerateNames(interop), associators(profile())}) {
+            EXPECT_EQ(reply.status.rc, code);
+            EXPECT_EQ(Testing::textOf(reply.status.msg),
+                "the instances of ZUMLO_NumericSensor cannot be enumerated: no sensors today");
+            EXPECT_FALSE(reply.found.isDone());
+        }
     }
+}
+
+TEST_F(ElementConformsToProfileTest, AFailureWithoutMessageIsReportedWithItsCode)
+{
+    Testing::FaultyBroker faulty(broker_);
+    faulty.plan({Testing::BrokerCall::enumerateInstanceNames, 1, Testing::FaultManner::errorStatus,
+        CMPI_RC_ERR_ACCESS_DENIED});
+    asked_ = faulty.handle();
+    const Reply reply = enumerateNames(interop);
+    EXPECT_EQ(reply.status.rc, CMPI_RC_ERR_ACCESS_DENIED);
+    EXPECT_EQ(Testing::textOf(reply.status.msg),
+        "the instances of ZUMLO_SensorRegisteredProfile cannot be enumerated");
 }
 
 TEST_F(ElementConformsToProfileTest, EachNameFindsItsInstance)
