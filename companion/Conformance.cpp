@@ -73,9 +73,12 @@ Conformance conformanceOf(const Upcalls& upcalls, const CMPIObjectPath* object)
 }
 
 std::vector<CMPIInstance*> conformingSensors(
-    const Upcalls& upcalls, const CMPIObjectPath* profile, const char** properties)
+    const Upcalls& upcalls, const CMPIObjectPath* object, const char** properties)
 {
     std::vector<CMPIInstance*> all;
+    const CMPIObjectPath* const profile = registeredProfile(upcalls);
+    if (!isObjPathsEqual(profile, object, false))
+        return all;
     for (const std::string& nameSpace : nameSpacesBeside(upcalls, profile))
         for (CMPIInstance* const sensor : upcalls.instances(nameSpace, SensorClass, properties))
             all.push_back(sensor);

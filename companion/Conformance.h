@@ -25,9 +25,9 @@ Conformance wholeConformance(const Upcalls& upcalls);
 // registration itself, the object alone for a sensor that exists, none for any other object.
 Conformance conformanceOf(const Upcalls& upcalls, const CMPIObjectPath* object);
 
-// Returns the instances of all sensors. The list of properties ends with a null and is null for all
-// properties.
+// Returns the instances of all sensors when the object is the registration, none for any other
+// object. The list of properties ends with a null and is null for all properties.
 std::vector<CMPIInstance*> conformingSensors(
-    const Upcalls& upcalls, const CMPIObjectPath* profile, const char** properties);
+    const Upcalls& upcalls, const CMPIObjectPath* object, const char** properties);
 
 } // namespace Vorn::Companion

@@ -8,6 +8,7 @@
 #include "companion/Conformance.h"
 #include "companion/RegisteredProfile.h"
 #include "companion/ResultWriter.h"
+#include "platform/utilities/KeyValue.h"
 #include "platform/utilities/ProviderUtilities.h"
 
 #include <array>
@@ -67,10 +68,11 @@ public:
     CMPIStatus get()
     {
         Conformance found = wholeConformance(upcalls_);
-        std::erase_if(found.sensors, [&](const CMPIObjectPath* sensor) {
-            return !isObjPathsEqual(associationPath(found.profile, sensor), target_, true);
-        });
-        if (found.sensors.empty())
+        const CMPIObjectPath* const element = targetReference(elementRole);
+        std::erase_if(found.sensors,
+            [&](const CMPIObjectPath* sensor) { return !isObjPathsEqual(sensor, element, false); });
+        if (found.sensors.empty() || CMGetKeyCount(target_, nullptr) != 2 ||
+            !isObjPathsEqual(found.profile, targetReference(standardRole), false))
             return failure(broker_, CMPI_RC_ERR_NOT_FOUND, "no such conformance");
         addAssociations(found);
         return result_.finish();
@@ -88,11 +90,12 @@ public:
         if (!isNear(filters) ||
             !admits(filters.resultRole, isFromProfile_ ? elementRole : standardRole))
             return result_.finish();
-        const Conformance found = conformanceOf(upcalls_, target_);
-        if (!found.sensors.empty() &&
-            isOfAdmittedClass(
-                isFromProfile_ ? found.sensors.front() : found.profile, filters.resultClass))
-            addFarEnds(found);
+        if (!isFromProfile_)
+            addProfile(filters.resultClass);
+        else if (kind_ == ResultKind::paths)
+            addSensors(conformanceOf(upcalls_, target_).sensors, filters.resultClass);
+        else
+            addSensors(conformingSensors(upcalls_, target_, properties_), filters.resultClass);
         return result_.finish();
     }
 
@@ -101,7 +104,8 @@ private:
     bool isNear(const Filters& filters) const
     {
         return admits(filters.role, isFromProfile_ ? standardRole : elementRole) &&
-               isOfAdmittedClass(newAssociationPath(), filters.associationClass);
+               (isUnset(filters.associationClass) ||
+                   isOfAdmittedClass(newAssociationPath(), filters.associationClass));
     }
 
     // Returns whether the class of the path is that of the filter, or below it. The object manager
@@ -112,9 +116,19 @@ private:
                (isUsable(path) && CMClassPathIsA(broker_, path, filter, nullptr) != 0);
     }
 
+    // Returns the reference that is a key of the target; null when there is none.
+    const CMPIObjectPath* targetReference(const char* role) const
+    {
+        if (!isUsable(target_))
+            return nullptr;
+        const KeyValue value = keyValue(CMGetKey(target_, role, nullptr));
+        const auto* const reference = std::get_if<const CMPIObjectPath*>(&value);
+        return reference == nullptr ? nullptr : *reference;
+    }
+
     const CMPIObjectPath* newAssociationPath() const
     {
-        return newPathIn(broker_, nameSpaceOf(target_), ConformsClass, getSystemName());
+        return newPathIn(broker_, nameSpaceOf(target_), ConformsClass, systemName_);
     }
 
     const CMPIObjectPath* associationPath(
@@ -150,19 +164,31 @@ private:
                 result_.add(association(found.profile, sensor));
     }
 
-    void addFarEnds(const Conformance& found)
+    void addProfile(const char* resultClass)
     {
-        if (!isFromProfile_ && kind_ == ResultKind::paths)
+        const Conformance found = conformanceOf(upcalls_, target_);
+        if (found.sensors.empty() || !isOfAdmittedClass(found.profile, resultClass))
+            return;
+        if (kind_ == ResultKind::paths)
             result_.add(found.profile);
-        else if (!isFromProfile_)
-            result_.add(makeProfileInstance(broker_, found.profile, properties_));
-        else if (kind_ == ResultKind::paths)
-            for (const CMPIObjectPath* const sensor : found.sensors)
-                result_.add(sensor);
         else
-            for (const CMPIInstance* const sensor :
-                conformingSensors(upcalls_, found.profile, properties_))
-                result_.add(sensor);
+            result_.add(makeProfileInstance(broker_, found.profile, properties_));
+    }
+
+    // All sensors are of one class.
+    template <typename Sensor>
+    void addSensors(const std::vector<Sensor*>& sensors, const char* resultClass)
+    {
+        if (sensors.empty() || !isOfAdmittedClass(pathOf(sensors.front()), resultClass))
+            return;
+        for (const Sensor* const sensor : sensors)
+            result_.add(sensor);
+    }
+
+    static const CMPIObjectPath* pathOf(const CMPIObjectPath* path) { return path; }
+    static const CMPIObjectPath* pathOf(const CMPIInstance* instance)
+    {
+        return CMGetObjectPath(instance, nullptr);
     }
 
     const CMPIBroker* broker_;
@@ -170,6 +196,7 @@ private:
     ResultKind kind_;
     const char** properties_;
     const bool isFromProfile_ = isOfClass(target_, RegisteredProfileClass);
+    const std::string systemName_ = getSystemName();
     Upcalls upcalls_;
     ResultWriter result_;
 };

@@ -117,11 +117,12 @@ protected:
         });
     }
 
-    Reply associators(const CMPIObjectPath* source, const char** properties = nullptr)
+    Reply associators(const CMPIObjectPath* source, const char** properties = nullptr,
+        const char* resultClass = nullptr)
     {
         return associations([&](auto& ft, auto* mi, auto* result) {
             return ft.associators(
-                mi, context(), result, source, nullptr, nullptr, nullptr, nullptr, properties);
+                mi, context(), result, source, nullptr, resultClass, nullptr, nullptr, properties);
         });
     }
 
@@ -279,6 +280,25 @@ TEST_F(ElementConformsToProfileTest, AnUnknownSensorConformsToNothing)
     EXPECT_THAT(pathsIn(referenceNames(sensor("none"))), IsEmpty());
 }
 
+TEST_F(ElementConformsToProfileTest, OtherKeysFindNothing)
+{
+    const auto find = [&](const CMPIObjectPath* standard, const char* extraKey) {
+        Host::ObjectPath& target = path(Class, {}, interop);
+        target.addKey("ManagedElement", Host::Value::of(*Host::ObjectPath::of(sensor("CPU"))));
+        if (standard != nullptr)
+            target.addKey("ConformantStandard", Host::Value::of(*Host::ObjectPath::of(standard)));
+        if (extraKey != nullptr)
+            target.addKey(extraKey, Host::Value::integer(CMPI_uint64, 1));
+        return get(target).status.rc;
+    };
+    EXPECT_EQ(find(profile(), nullptr), CMPI_RC_OK);
+    EXPECT_EQ(find(profile(), "Other"), CMPI_RC_ERR_NOT_FOUND);
+    EXPECT_EQ(find(profile("ZUMLO:Other"), nullptr), CMPI_RC_ERR_NOT_FOUND);
+    EXPECT_EQ(find(sensor("CPU"), nullptr), CMPI_RC_ERR_NOT_FOUND);
+    EXPECT_EQ(find(nullptr, nullptr), CMPI_RC_ERR_NOT_FOUND);
+    EXPECT_EQ(find(nullptr, "ConformantStandard"), CMPI_RC_ERR_NOT_FOUND);
+}
+
 TEST_F(ElementConformsToProfileTest, TheProfileLeadsToAllSensors)
 {
     EXPECT_THAT(pathsIn(associatorNames(profile())), ElementsAre(cpuPath, fanPath));
@@ -295,6 +315,15 @@ TEST_F(ElementConformsToProfileTest, TheProfileLeadsToInstancesWithTheListedProp
     EXPECT_EQ(Testing::property(*all.found.instances()[0], "Caption"), "string \"A sensor\"");
     ASSERT_THAT(listed.found.instances(), SizeIs(2));
     EXPECT_EQ(Testing::property(*listed.found.instances()[0], "Caption"), "absent");
+    EXPECT_THAT(associators(profile("ZUMLO:Other")).found.instances(), IsEmpty());
+}
+
+TEST_F(ElementConformsToProfileTest, TheSensorsAreEnumeratedOnceForTheirInstances)
+{
+    associators(profile());
+    EXPECT_THAT(objects_.calls,
+        ElementsAre("root/interop:ZUMLO_SensorRegisteredProfile", "root/interop:CIM_Namespace",
+            "root/cimv2:ZUMLO_NumericSensor", "root/interop:ZUMLO_NumericSensor"));
 }
 
 TEST_F(ElementConformsToProfileTest, ASensorLeadsToTheProfile)
@@ -352,8 +381,11 @@ TEST_F(ElementConformsToProfileTest, OtherFiltersLeadNowhereWithoutAnUpcall)
 
 TEST_F(ElementConformsToProfileTest, AResultClassThatTheFarEndIsNotOfLeadsNowhere)
 {
-    for (const char* const resultClass : {"CIM_Fan", "CIM_RegisteredProfile"})
+    for (const char* const resultClass : {"CIM_Fan", "CIM_RegisteredProfile"}) {
         EXPECT_THAT(pathsIn(associatorNames(profile(), {.resultClass = resultClass})), IsEmpty());
+        EXPECT_THAT(associators(profile(), nullptr, resultClass).found.instances(), IsEmpty());
+    }
+    EXPECT_THAT(associators(profile(), nullptr, "CIM_Sensor").found.instances(), SizeIs(2));
     EXPECT_THAT(pathsIn(associatorNames(sensor("CPU"), {.resultClass = "CIM_Sensor"})), IsEmpty());
 }
 
