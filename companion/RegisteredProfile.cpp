@@ -24,16 +24,8 @@ struct SensorsProfile {
     static constexpr const char* provider = "instanceSensorRegisteredProfileProvider";
     static constexpr const char* notFound = "no such registered profile";
 
-    static CMPIObjectPath* path(const CMPIBroker* broker, const CMPIObjectPath* ref)
-    {
-        return makeProfilePath(broker, nameSpaceOf(ref));
-    }
-
-    static CMPIInstance* instance(
-        const CMPIBroker* broker, const CMPIObjectPath* path, const char** properties)
-    {
-        return makeProfileInstance(broker, path, properties);
-    }
+    static constexpr auto path = makeProfilePath;
+    static constexpr auto instance = makeProfileInstance;
 };
 
 } // namespace

@@ -20,12 +20,12 @@ public:
     // Write the object; null stands for one that the broker failed to make.
     void add(const CMPIObjectPath* path)
     {
-        if (isWanted(path))
+        if (isWanted(path, "the object path cannot be made"))
             status_ = CMReturnObjectPath(result_, path);
     }
     void add(const CMPIInstance* instance)
     {
-        if (isWanted(instance))
+        if (isWanted(instance, "the instance cannot be made"))
             status_ = CMReturnInstance(result_, instance);
     }
 
@@ -34,10 +34,10 @@ public:
 
 private:
     template <typename Object>
-    bool isWanted(const Object* object)
+    bool isWanted(const Object* object, const char* whatFails)
     {
         if (status_.rc == CMPI_RC_OK && !isUsable(object))
-            status_ = failure(broker_, CMPI_RC_ERR_FAILED, "an object cannot be made");
+            status_ = failure(broker_, CMPI_RC_ERR_FAILED, whatFails);
         return status_.rc == CMPI_RC_OK;
     }
 

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-#include "companion/ComputerSystemObjects.h"
+#include "companion/ComputerSystem.h"
 
 #include "platform/text/Trim.h"
 #include "tests/support/ExportedNames.h"
@@ -8,25 +8,24 @@
 
 #include <gmock/gmock.h>
 
-namespace ComputerSystemObjectsTests {
+namespace ComputerSystemTests {
 
 using Testing::describe;
 using ::testing::ElementsAre;
 using Vorn::Companion::ComputerSystem;
 
-constexpr const char* Class = Vorn::Companion::ComputerSystemClass;
-
-class ComputerSystemObjectsTest : public Testing::ProviderTest {
+class ComputerSystemTest : public Testing::ProviderTest {
 protected:
     const Host::Instance& instance(const ComputerSystem& system, const char** properties = nullptr)
     {
         const CMPIObjectPath* const at =
-            Vorn::Companion::makePath(broker(), path(Class).handle(), system);
-        return *Host::Instance::of(Vorn::Companion::makeInstance(broker(), at, system, properties));
+            Vorn::Companion::makeSystemPath(broker(), "root/cimv2", system);
+        return *Host::Instance::of(
+            Vorn::Companion::makeSystemInstance(broker(), at, system, properties));
     }
 };
 
-TEST_F(ComputerSystemObjectsTest, AnInstanceHasEveryProperty)
+TEST_F(ComputerSystemTest, AnInstanceHasEveryProperty)
 {
     EXPECT_THAT(describe(instance({"box", "some-hash"}).properties()),
         ElementsAre("CreationClassName = string \"ZUMLO_ComputerSystem\"", "Name = string \"box\"",
@@ -39,7 +38,7 @@ TEST_F(ComputerSystemObjectsTest, AnInstanceHasEveryProperty)
             "HealthState = uint16 5", "OperationalStatus = [uint16 2]"));
 }
 
-TEST_F(ComputerSystemObjectsTest, AMachineWithoutIdentifierHasNoIdentifyingInfo)
+TEST_F(ComputerSystemTest, AMachineWithoutIdentifierHasNoIdentifyingInfo)
 {
     const Host::Instance& made = instance({"box", std::nullopt});
     EXPECT_EQ(made.property("OtherIdentifyingInfo"), nullptr);
@@ -47,35 +46,35 @@ TEST_F(ComputerSystemObjectsTest, AMachineWithoutIdentifierHasNoIdentifyingInfo)
     EXPECT_EQ(made.properties().size(), 11U);
 }
 
-TEST_F(ComputerSystemObjectsTest, APropertyListLeavesTheKeysAndWhatItNames)
+TEST_F(ComputerSystemTest, APropertyListLeavesTheKeysAndWhatItNames)
 {
     const char* properties[] = {"healthstate", "Unheard", nullptr};
     EXPECT_THAT(Testing::namesOf(instance({"box", "id"}, properties).properties()),
         ElementsAre("CreationClassName", "Name", "HealthState"));
 }
 
-TEST_F(ComputerSystemObjectsTest, AnEmptyPropertyListLeavesTheKeys)
+TEST_F(ComputerSystemTest, AnEmptyPropertyListLeavesTheKeys)
 {
     const char* properties[] = {nullptr};
     EXPECT_THAT(Testing::namesOf(instance({"box", "id"}, properties).properties()),
         ElementsAre("CreationClassName", "Name"));
 }
 
-TEST_F(ComputerSystemObjectsTest, ThePathHasTheRequestsNamespaceAndTheComputerAsHost)
+TEST_F(ComputerSystemTest, ThePathHasTheNamespaceAndTheComputerAsHost)
 {
-    const CMPIObjectPath* const made = Vorn::Companion::makePath(
-        broker(), path(Class, {}, "root/other").handle(), {"box", std::nullopt});
+    const CMPIObjectPath* const made =
+        Vorn::Companion::makeSystemPath(broker(), "root/other", {"box", std::nullopt});
     EXPECT_EQ(Host::ObjectPath::of(made)->toText(),
         "//box/root/other:ZUMLO_ComputerSystem.CreationClassName=\"ZUMLO_ComputerSystem\","
         "Name=\"box\"");
 }
 
-TEST_F(ComputerSystemObjectsTest, TheComputerHasTheSystemNameOfItsSensors)
+TEST_F(ComputerSystemTest, TheComputerHasTheSystemNameOfItsSensors)
 {
     EXPECT_EQ(Vorn::Companion::thisComputerSystem().name, systemName_);
 }
 
-TEST_F(ComputerSystemObjectsTest, TheMachineIdIsTheOneThatTheSystemDerivesForThisProvider)
+TEST_F(ComputerSystemTest, TheMachineIdIsTheOneThatTheSystemDerivesForThisProvider)
 {
     ASSERT_NE(Testing::outputOf("systemd-id128 new"), "") << "is the package systemd installed?";
     EXPECT_EQ(Vorn::Companion::thisComputerSystem().machineId.value_or(""),
@@ -84,4 +83,4 @@ TEST_F(ComputerSystemObjectsTest, TheMachineIdIsTheOneThatTheSystemDerivesForThi
                               "--app-specific=b3dfdcbb7a2845c0b6176da21f2a762d 2>/dev/null")));
 }
 
-} // namespace ComputerSystemObjectsTests
+} // namespace ComputerSystemTests
