@@ -10,7 +10,7 @@
 #include "bench/ServerProcess.h"
 #include "bench/Skim.h"
 #include "platform/utilities/ProviderUtilities.h"
-#include "tests/objectmanagers/ObjectManager.h"
+#include "tests/objectmanagers/InstalledManager.h"
 #include "tests/support/CimCall.h"
 #include "tests/support/HttpClient.h"
 #include "tests/support/Texts.h"
@@ -27,7 +27,7 @@
 namespace {
 
 using Testing::HttpClient;
-using Testing::ObjectManager;
+using Testing::InstalledManager;
 using Clock = std::chrono::steady_clock;
 using Milliseconds = std::chrono::duration<double, std::milli>;
 
@@ -142,11 +142,11 @@ void printTable(int rounds)
 {
     const Bench::ModelMachine machine(sensors);
     const Bench::ServerProcess server;
-    const std::vector<const ObjectManager*> managers = {
-        &ObjectManager::openPegasus(), &ObjectManager::sfcb()};
+    const std::vector<const InstalledManager*> managers = {
+        &InstalledManager::openPegasus(), &InstalledManager::sfcb()};
     std::vector<Peer> peers;
     peers.emplace_back("sensorctl serve", server.port());
-    for (const ObjectManager* const manager : managers) {
+    for (const InstalledManager* const manager : managers) {
         manager->startWithProviders(
             {{"VORN_INSTRUMENTATION", std::getenv("VORN_INSTRUMENTATION")}, {"RYNLOG_LOG", "off"}});
         peers.emplace_back(manager->name(), static_cast<std::uint16_t>(manager->port()));
@@ -160,7 +160,7 @@ void printTable(int rounds)
              Row{"EnumerateInstances", enumerateInstances(), sensors},
              Row{"EnumerateInstances, properties listed", enumerateInstances(set), sensors}})
         print(row, peers, rounds);
-    for (const ObjectManager* const manager : managers)
+    for (const InstalledManager* const manager : managers)
         manager->stop();
 }
 

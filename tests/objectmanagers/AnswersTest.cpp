@@ -4,7 +4,7 @@
 // differences that are known.
 
 #include "tests/objectmanagers/Differences.h"
-#include "tests/objectmanagers/ObjectManager.h"
+#include "tests/objectmanagers/InstalledManager.h"
 #include "tests/tools/ServerProcess.h"
 #include "tests/tools/ToolTest.h"
 
@@ -17,13 +17,14 @@ namespace {
 using namespace Testing;
 
 struct Peer {
-    const ObjectManager& manager;
+    const InstalledManager& manager;
     std::span<const Difference> differences;
     std::vector<Answer> answers = {}; // one for each request
     Declarations declarations = {};
 };
 
-std::vector<Answer> askAll(const ObjectManager& manager, const std::vector<ClientRequest>& requests)
+std::vector<Answer> askAll(
+    const InstalledManager& manager, const std::vector<ClientRequest>& requests)
 {
     std::vector<Answer> answers;
     for (const ClientRequest& request : requests)
@@ -31,7 +32,7 @@ std::vector<Answer> askAll(const ObjectManager& manager, const std::vector<Clien
     return answers;
 }
 
-Declarations declarationsIn(const ObjectManager& manager)
+Declarations declarationsIn(const InstalledManager& manager)
 {
     Declarations declarations;
     for (const std::string& name : servedClasses)
@@ -71,14 +72,14 @@ public:
             return known->second;
         const std::string url =
             "http://127.0.0.1:" + std::to_string(service_.port()) +
-            (ObjectManager::isInterop(request.object) ? "/root/interop:" : "/root/cimv2:") +
+            (InstalledManager::isInterop(request.object) ? "/root/interop:" : "/root/cimv2:") +
             request.object;
         return serviceAnswers_.emplace(request, ask(request.arguments(url))).first->second;
     }
 
     std::vector<ClientRequest> requests;
-    std::vector<Peer> peers = {{ObjectManager::openPegasus(), differencesOfOpenPegasus()},
-        {ObjectManager::sfcb(), differencesOfSfcb()}};
+    std::vector<Peer> peers = {{InstalledManager::openPegasus(), differencesOfOpenPegasus()},
+        {InstalledManager::sfcb(), differencesOfSfcb()}};
 
 private:
     void TestBody() override {}

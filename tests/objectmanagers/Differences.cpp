@@ -17,8 +17,8 @@ using Result = std::optional<Equivalent>;
 
 // ---- Both
 
-// Returns a request for each association of a sensor: the first one for those of the sensors'
-// provider.
+// Returns a request for each association of a sensor: `ours` by ZUMLO_SensorSystemDevice, which is the
+// first, and by ZUMLO_SensorElementCapabilities, and the other by that with the registered profile.
 Equivalent byEachAssociation(ClientRequest ours, ClientRequest conforming)
 {
     ClientRequest one = ours;
@@ -221,14 +221,9 @@ Result withWholeSystems(const ClientRequest& request)
     if (!request.isAssociators() || !isFromSensor(request) || !request.association.empty() ||
         request.properties.empty())
         return std::nullopt;
-    ClientRequest one = request;
-    ClientRequest other = request;
-    one.association = systemDevice;
-    one.properties = "";
-    other.association = elementCapabilities;
-    ClientRequest conforming = request;
-    conforming.association = conformance;
-    return Equivalent{.requests = {one, other, conforming}};
+    Equivalent each = byEachAssociation(request, request);
+    each.requests.front().properties = "";
+    return each;
 }
 
 Result needingTheAssociation(const ClientRequest& request)

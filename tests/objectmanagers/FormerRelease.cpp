@@ -32,14 +32,14 @@ FormerRelease::FormerRelease()
 }
 
 void FormerRelease::registerIn(
-    const ObjectManager& manager, const std::string& providerFolder) const
+    const InstalledManager& manager, const std::string& providerFolder) const
 {
     for (const char* const name : {sensorProvider, systemProvider})
         fs::create_symlink(prefix_ / libraryFolder / name, fs::path(providerFolder) / name);
     const std::string share = prefix_ / classFolder;
     const std::vector<std::string> files = {
         share + "/sensor-profile-computer-system.mof", share + "/sensor-profile.mof"};
-    if (&manager == &ObjectManager::openPegasus()) {
+    if (&manager == &InstalledManager::openPegasus()) {
         for (const std::string& file : files)
             manager.command("cimmof", {"-uc", "-n", "root/cimv2", file});
         manager.command("cimmof",

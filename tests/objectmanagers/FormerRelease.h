@@ -4,7 +4,7 @@
 
 #pragma once
 
-#include "tests/objectmanagers/ObjectManager.h"
+#include "tests/objectmanagers/InstalledManager.h"
 #include "tests/support/TemporaryFolder.h"
 
 #include <filesystem>
@@ -22,7 +22,7 @@ public:
 
     // Runs the commands that sensor-profile-register of the release ran. They link the libraries
     // into the folder.
-    void registerIn(const ObjectManager& manager, const std::string& providerFolder) const;
+    void registerIn(const InstalledManager& manager, const std::string& providerFolder) const;
 
     // Replaces the installed files by those of this build. As in an upgrade of the Debian package,
     // the former name of the library becomes a link to the library.

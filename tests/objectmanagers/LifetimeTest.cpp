@@ -6,7 +6,7 @@
 
 #include "tests/objectmanagers/Agents.h"
 #include "tests/objectmanagers/Answer.h"
-#include "tests/objectmanagers/ObjectManager.h"
+#include "tests/objectmanagers/InstalledManager.h"
 #include "tests/support/WaitUntil.h"
 
 #include <gtest/gtest.h>
@@ -18,7 +18,7 @@ namespace {
 
 using namespace Testing;
 
-class LifetimeTest : public testing::TestWithParam<const ObjectManager*> {
+class LifetimeTest : public testing::TestWithParam<const InstalledManager*> {
 protected:
     void SetUp() override
     {
@@ -36,7 +36,7 @@ protected:
     }
     void TearDown() override { manager_.stop(); }
 
-    bool isSfcb() const { return &manager_ == &ObjectManager::sfcb(); }
+    bool isSfcb() const { return &manager_ == &InstalledManager::sfcb(); }
 
     // Makes sfcb unload a provider after three seconds without a request. It looks for such
     // providers every second; the defaults are 60 and 30 seconds.
@@ -64,7 +64,7 @@ protected:
             manager_.command("cimprovider", {option, "-m", module});
     }
 
-    const ObjectManager& manager_ = *GetParam();
+    const InstalledManager& manager_ = *GetParam();
     std::vector<std::string> before_;
 };
 
@@ -88,7 +88,7 @@ TEST_P(LifetimeTest, AnswersAgainAfterItWasUnloaded)
 }
 
 INSTANTIATE_TEST_SUITE_P(ObjectManagers, LifetimeTest,
-    testing::Values(&ObjectManager::openPegasus(), &ObjectManager::sfcb()),
+    testing::Values(&InstalledManager::openPegasus(), &InstalledManager::sfcb()),
     [](const auto& each) { return each.param->name(); });
 
 } // namespace

@@ -6,7 +6,7 @@
 #include "tests/objectmanagers/Agents.h"
 #include "tests/objectmanagers/Answer.h"
 #include "tests/objectmanagers/ClientRequest.h"
-#include "tests/objectmanagers/ObjectManager.h"
+#include "tests/objectmanagers/InstalledManager.h"
 #include "tests/support/WaitUntil.h"
 #include "tests/tools/ToolTest.h"
 
@@ -23,7 +23,7 @@ using namespace Testing;
 namespace fs = std::filesystem;
 
 struct Instrumented {
-    const ObjectManager& manager;
+    const InstalledManager& manager;
     std::string program; // of the object manager, which runs the providers
 
     friend std::ostream& operator<<(std::ostream& stream, const Instrumented& instrumented)
@@ -85,7 +85,7 @@ protected:
         });
     }
 
-    bool isSfcb() const { return &manager_ == &ObjectManager::sfcb(); }
+    bool isSfcb() const { return &manager_ == &InstalledManager::sfcb(); }
 
     // Returns the errors that have one of our libraries on the stack on which they were found, or
     // on which a leaked block was allocated. Other stacks explain where an address belongs.
@@ -104,7 +104,7 @@ protected:
         return errors;
     }
 
-    const ObjectManager& manager_ = GetParam().manager;
+    const InstalledManager& manager_ = GetParam().manager;
 };
 
 TEST_P(MemoryTest, HasNoErrorOfOurs)
@@ -134,8 +134,8 @@ TEST_P(MemoryTest, HasNoErrorOfOurs)
 }
 
 INSTANTIATE_TEST_SUITE_P(ObjectManagers, MemoryTest,
-    testing::Values(Instrumented{ObjectManager::openPegasus(), "bin/cimprovagt"},
-        Instrumented{ObjectManager::sfcb(), "sbin/sfcbd"}),
+    testing::Values(Instrumented{InstalledManager::openPegasus(), "bin/cimprovagt"},
+        Instrumented{InstalledManager::sfcb(), "sbin/sfcbd"}),
     [](const auto& each) { return each.param.manager.name(); });
 
 } // namespace

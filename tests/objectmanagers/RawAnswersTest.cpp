@@ -2,7 +2,7 @@
 
 // OpenPegasus, sfcb and `sensorctl serve` answer requests that wbemcli cannot send.
 
-#include "tests/objectmanagers/ObjectManager.h"
+#include "tests/objectmanagers/InstalledManager.h"
 #include "tests/support/CimCall.h"
 #include "tests/support/HttpClient.h"
 #include "tests/tools/ServerProcess.h"
@@ -34,7 +34,8 @@ class Machine : public ToolTest {
 public:
     Machine()
     {
-        for (const ObjectManager* each : {&ObjectManager::openPegasus(), &ObjectManager::sfcb()}) {
+        for (const InstalledManager* each :
+            {&InstalledManager::openPegasus(), &InstalledManager::sfcb()}) {
             each->reset();
             each->startWithProviders(settings_);
         }
@@ -57,11 +58,11 @@ protected:
 
     static std::string fromOpenPegasus(const std::string& operation, const std::string& parameters)
     {
-        return answer(ObjectManager::openPegasus().port(), operation, parameters);
+        return answer(InstalledManager::openPegasus().port(), operation, parameters);
     }
     static std::string fromSfcb(const std::string& operation, const std::string& parameters)
     {
-        return answer(ObjectManager::sfcb().port(), operation, parameters);
+        return answer(InstalledManager::sfcb().port(), operation, parameters);
     }
     static std::string fromService(const std::string& operation, const std::string& parameters)
     {
@@ -138,12 +139,12 @@ TEST_F(RawAnswersTest, HaveHostsAtBothEndsOfReferencesButInSfcb)
         cimParameter("ResultClass", "<CLASSNAME NAME=\"ZUMLO_SensorElementCapabilities\"/>");
     for (const auto& [operation, references] :
         {std::pair("References", 20U), {"ReferenceNames", 10U}})
-        for (const unsigned port : {ObjectManager::openPegasus().port(),
-                 ObjectManager::sfcb().port(), machine_->servicePort()}) {
+        for (const unsigned port : {InstalledManager::openPegasus().port(),
+                 InstalledManager::sfcb().port(), machine_->servicePort()}) {
             const std::string body = replaced(bodyOf(port, operation, parameters), "\n", "");
             EXPECT_EQ(countOf(body, "<VALUE.REFERENCE>"), references) << operation << port;
             EXPECT_EQ(countOf(body, "<VALUE.REFERENCE><INSTANCEPATH><NAMESPACEPATH><HOST>"),
-                port == ObjectManager::sfcb().port() ? 0U : references)
+                port == InstalledManager::sfcb().port() ? 0U : references)
                 << operation << port;
         }
 }

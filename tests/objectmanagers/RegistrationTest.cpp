@@ -5,7 +5,7 @@
 
 #include "tests/objectmanagers/Answer.h"
 #include "tests/objectmanagers/FormerRelease.h"
-#include "tests/objectmanagers/ObjectManager.h"
+#include "tests/objectmanagers/InstalledManager.h"
 #include "tests/support/Texts.h"
 #include "tests/tools/ChildProcess.h"
 
@@ -19,12 +19,12 @@ namespace {
 using namespace Testing;
 namespace fs = std::filesystem;
 
-class RegistrationTest : public testing::TestWithParam<const ObjectManager*> {
+class RegistrationTest : public testing::TestWithParam<const InstalledManager*> {
 protected:
     void SetUp() override { reset(); }
     void TearDown() override { manager_.stop(); }
 
-    bool isSfcb() const { return &manager_ == &ObjectManager::sfcb(); }
+    bool isSfcb() const { return &manager_ == &InstalledManager::sfcb(); }
 
     // Makes it what it was when it was installed. The commands of OpenPegasus need it running.
     void reset() const
@@ -157,7 +157,7 @@ protected:
         return names;
     }
 
-    const ObjectManager& manager_ = *GetParam();
+    const InstalledManager& manager_ = *GetParam();
     const TemporaryFolder folder_;
 };
 
@@ -250,7 +250,7 @@ TEST_P(RegistrationTest, StaysAsItWasWhenClassesDoNotCompile)
 }
 
 INSTANTIATE_TEST_SUITE_P(ObjectManagers, RegistrationTest,
-    testing::Values(&ObjectManager::openPegasus(), &ObjectManager::sfcb()),
+    testing::Values(&InstalledManager::openPegasus(), &InstalledManager::sfcb()),
     [](const auto& each) { return each.param->name(); });
 
 } // namespace

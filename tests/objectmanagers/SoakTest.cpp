@@ -4,7 +4,7 @@
 
 #include "tests/objectmanagers/Agents.h"
 #include "tests/objectmanagers/Answer.h"
-#include "tests/objectmanagers/ObjectManager.h"
+#include "tests/objectmanagers/InstalledManager.h"
 #include "tests/support/MountNamespace.h"
 #include "tests/support/Texts.h"
 
@@ -35,7 +35,7 @@ constexpr std::size_t growthKilobytes = 4096;
 // Runs clients of one object manager in threads.
 class Clients {
 public:
-    Clients(const ObjectManager& manager, Clock::time_point end) : manager_(manager)
+    Clients(const InstalledManager& manager, Clock::time_point end) : manager_(manager)
     {
         const std::string system =
             ask({"ein", manager.url("ZUMLO_ComputerSystem")}).objects.begin()->first;
@@ -74,7 +74,7 @@ private:
         EXPECT_TRUE(answer.objects.size() == 2 || answer.objects.size() == 3) << describe(answer);
     }
 
-    const ObjectManager& manager_;
+    const InstalledManager& manager_;
     std::atomic<int> answers_{0};
     std::atomic<int> withChip_{0};
     std::atomic<int> withoutChip_{0};
@@ -86,9 +86,9 @@ TEST(SoakTest, NothingFailsOrGrowsWhileAChipComesAndGoes)
     // It lasts long enough to run beside all other tests without being in their way.
     EXPECT_NE(::nice(10), -1);
     BoundSysfs sysfs("hotplug");
-    const std::vector<const ObjectManager*> managers = {
-        &ObjectManager::openPegasus(), &ObjectManager::sfcb()};
-    for (const ObjectManager* manager : managers) {
+    const std::vector<const InstalledManager*> managers = {
+        &InstalledManager::openPegasus(), &InstalledManager::sfcb()};
+    for (const InstalledManager* manager : managers) {
         manager->reset();
         manager->startWithProviders({{"RYNLOG_LOG", "off"}});
     }
@@ -108,14 +108,14 @@ TEST(SoakTest, NothingFailsOrGrowsWhileAChipComesAndGoes)
     // Memory of the first requests stays.
     soak(soakTime / 6);
     std::map<::pid_t, std::size_t> before;
-    for (const ObjectManager* manager : managers) {
+    for (const InstalledManager* manager : managers) {
         const auto agents = agentsBelow(manager->folder());
         EXPECT_FALSE(agents.empty()) << manager->name();
         for (const ::pid_t agent : agents)
             before[agent] = residentKilobytes(agent);
     }
     soak(soakTime);
-    for (const ObjectManager* manager : managers)
+    for (const InstalledManager* manager : managers)
         for (const ::pid_t agent : agentsBelow(manager->folder())) {
             EXPECT_TRUE(before.contains(agent)) << manager->name() << ": an agent ended";
             EXPECT_LT(residentKilobytes(agent), before[agent] + growthKilobytes) << manager->name();

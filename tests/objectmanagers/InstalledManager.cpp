@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-#include "tests/objectmanagers/ObjectManager.h"
+#include "tests/objectmanagers/InstalledManager.h"
 
 #include "tests/tools/ChildProcess.h"
 
@@ -9,32 +9,32 @@
 
 namespace Testing {
 
-ObjectManager::ObjectManager(
+InstalledManager::InstalledManager(
     std::string name, unsigned port, std::vector<std::string> registerOptions)
     : name_(std::move(name)), port_(port), registerOptions_(std::move(registerOptions))
 {
 }
 
-const ObjectManager& ObjectManager::openPegasus()
+const InstalledManager& InstalledManager::openPegasus()
 {
-    static const ObjectManager manager(
+    static const InstalledManager manager(
         "openpegasus", 25988, {"--provider-folder", "/opt/openpegasus/lib"});
     return manager;
 }
 
-const ObjectManager& ObjectManager::sfcb()
+const InstalledManager& InstalledManager::sfcb()
 {
     // Its configuration, beside its commands, names its folders.
-    static const ObjectManager manager("sfcb", 15988, {});
+    static const InstalledManager manager("sfcb", 15988, {});
     return manager;
 }
 
-std::string ObjectManager::url(const std::string& object, const std::string& space) const
+std::string InstalledManager::url(const std::string& object, const std::string& space) const
 {
     return "http://127.0.0.1:" + std::to_string(port_) + '/' + space + ':' + object;
 }
 
-void ObjectManager::start(const std::map<std::string, std::string>& environment) const
+void InstalledManager::start(const std::map<std::string, std::string>& environment) const
 {
     std::vector<std::string> settings = {"LC_ALL=C"};
     for (const auto& [name, value] : environment)
@@ -42,17 +42,18 @@ void ObjectManager::start(const std::map<std::string, std::string>& environment)
     command(folder_ + "/start", settings);
 }
 
-void ObjectManager::stop() const
+void InstalledManager::stop() const
 {
     command(folder_ + "/stop", {});
 }
 
-void ObjectManager::reset() const
+void InstalledManager::reset() const
 {
     command(folder_ + "/reset", {});
 }
 
-void ObjectManager::startWithProviders(const std::map<std::string, std::string>& environment) const
+void InstalledManager::startWithProviders(
+    const std::map<std::string, std::string>& environment) const
 {
     // sfcb reads its registrations when it starts; the commands of OpenPegasus need it running.
     if (this == &sfcb())
@@ -62,7 +63,7 @@ void ObjectManager::startWithProviders(const std::map<std::string, std::string>&
         runRegister({"register"});
 }
 
-std::string ObjectManager::command(
+std::string InstalledManager::command(
     const std::string& program, std::vector<std::string> arguments) const
 {
     arguments.insert(arguments.begin(), program);
@@ -75,7 +76,7 @@ std::string ObjectManager::command(
     return ended.out;
 }
 
-std::string ObjectManager::runRegister(
+std::string InstalledManager::runRegister(
     std::vector<std::string> arguments, const std::filesystem::path& installation) const
 {
     arguments.insert(arguments.begin(), registerOptions_.begin(), registerOptions_.end());

@@ -19,10 +19,10 @@ inline const std::vector<std::string> servedClasses = {"ZUMLO_NumericSensor",
     "ZUMLO_SensorElementConformsToProfile", "ZUMLO_SensorRegisteredProfile"};
 
 // Functions that run a command throw std::runtime_error with what it printed when it fails.
-class ObjectManager {
+class InstalledManager {
 public:
-    static const ObjectManager& openPegasus();
-    static const ObjectManager& sfcb();
+    static const InstalledManager& openPegasus();
+    static const InstalledManager& sfcb();
 
     // Returns its name, as sensor-profile-register takes it.
     const std::string& name() const { return name_; }
@@ -62,7 +62,7 @@ public:
         const std::filesystem::path& installation = movedInstallation()) const;
 
 private:
-    ObjectManager(std::string name, unsigned port, std::vector<std::string> folders);
+    InstalledManager(std::string name, unsigned port, std::vector<std::string> registerOptions);
 
     std::string name_;
     unsigned port_;
