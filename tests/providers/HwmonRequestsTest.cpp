@@ -6,7 +6,7 @@
 #include "host/broker/Broker.h"
 #include "host/broker/Instance.h"
 #include "tests/providers/Factories.h"
-#include "tests/providers/SensorEnumeration.h"
+#include "tests/providers/SensorRequest.h"
 #include "tests/support/Environment.h"
 #include "tests/support/MountNamespace.h"
 
@@ -32,7 +32,7 @@ protected:
     // Returns the readings by device identifier.
     std::map<std::string, std::int64_t> readings()
     {
-        const Testing::SensorEnumeration sensors(broker_, mi_);
+        const Testing::SensorRequest sensors(broker_, mi_);
         std::map<std::string, std::int64_t> found;
         for (const Host::Instance* const sensor : sensors.instances())
             if (!hasLostCommunication(*sensor))

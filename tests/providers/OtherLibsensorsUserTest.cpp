@@ -5,7 +5,7 @@
 
 #include "host/broker/Broker.h"
 #include "tests/providers/Factories.h"
-#include "tests/providers/SensorEnumeration.h"
+#include "tests/providers/SensorRequest.h"
 #include "tests/support/Environment.h"
 #include "tests/support/MountNamespace.h"
 
@@ -91,7 +91,7 @@ public:
     }
 
     // Returns the number of sensors in the answer to EnumInstances.
-    std::size_t sensors() { return Testing::SensorEnumeration(broker_, mi_).instances().size(); }
+    std::size_t sensors() { return Testing::SensorRequest(broker_, mi_).instances().size(); }
 
 private:
     Host::Broker broker_;

@@ -15,9 +15,9 @@
 namespace Testing {
 
 // One EnumInstances request for the sensors, whose instances live as long as the object.
-class SensorEnumeration {
+class SensorRequest {
 public:
-    SensorEnumeration(Host::Broker& broker, CMPIInstanceMI* mi) : request_(broker)
+    SensorRequest(Host::Broker& broker, CMPIInstanceMI* mi) : request_(broker)
     {
         Host::Result result(answer_);
         const CMPIStatus status =
