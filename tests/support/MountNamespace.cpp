@@ -31,10 +31,10 @@ std::string& refusal()
 }
 
 // Returns the command. It maps an ordinary user to root of a user namespace, who may mount.
-std::vector<std::string> unshareCommand()
+std::vector<std::string> enterCommand()
 {
     if (geteuid() == 0)
-        return {"unshare", "--mount"};
+        return {SENSOR_PROFILE_PRIVATE_MOUNTS};
     return {"unshare", "--user", "--map-root-user", "--mount"};
 }
 
@@ -57,7 +57,7 @@ std::string complaintOf(const std::vector<std::string>& command)
 
 void executeInside(char** argv)
 {
-    std::vector<std::string> words = unshareCommand();
+    std::vector<std::string> words = enterCommand();
     words.emplace_back(fs::read_symlink("/proc/self/exe"));
     std::vector<char*> arguments;
     for (std::string& word : words)
@@ -67,7 +67,7 @@ void executeInside(char** argv)
     arguments.push_back(nullptr);
     setenv(insideVariable, "1", 1);
     execvp(arguments.front(), arguments.data());
-    refusal() = "unshare: " + std::generic_category().message(errno);
+    refusal() = words.front() + ": " + std::generic_category().message(errno);
 }
 
 void writeFile(const fs::path& path, const std::string& text)
@@ -120,7 +120,7 @@ void enterMountNamespace(char** argv)
 {
     if (std::getenv(insideVariable) != nullptr)
         refusal().clear();
-    else if (refusal() = complaintOf(unshareCommand()); refusal().empty())
+    else if (refusal() = complaintOf(enterCommand()); refusal().empty())
         executeInside(argv);
 }
 

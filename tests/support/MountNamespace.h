@@ -14,7 +14,7 @@
 
 namespace Testing {
 
-// Executes the program again by `unshare`; returns when it runs in the namespace already or none
+// Executes the program again by `private_mounts` or `unshare`; returns when it runs in the namespace already or none
 // can be created. REQUIRES: called first in main(), with main's argument.
 void enterMountNamespace(char** argv);
 
