@@ -121,7 +121,7 @@ bool getSensorInstances(std::vector<Sensor>& vectSensor)
                 nothing = false;
         } catch (const std::exception& error) {
             // The text printed is deliberately the generic one of the base class.
-            RynLog::writeToStandardError(std::string(error.std::exception::what()) + '\n');
+            RynLog::reportToStandardError(std::string(error.std::exception::what()) + '\n');
         }
     }
     traced.exiting(HarvestLines::getSensorInstances.exit);
@@ -156,7 +156,7 @@ bool getSensorEnabledLogCapInstances(std::vector<SensorEnabledLogCap>& vectSenso
     try {
         vectSensorEnabledLogCap.emplace_back();
     } catch (const std::exception& error) {
-        RynLog::writeToStandardError(std::string(error.what()) + '\n');
+        RynLog::reportToStandardError(std::string(error.what()) + '\n');
         traced.exiting(HarvestLines::getSensorEnabledLogCapInstancesFailed);
         return true;
     }

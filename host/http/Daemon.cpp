@@ -82,11 +82,11 @@ void reportFailure(const Place& place) noexcept
     try {
         throw;
     } catch (const std::bad_alloc&) {
-        report(place, "no memory for a request");
+        report(place, "no memory for a request", Severity::error);
     } catch (const std::exception& error) {
-        report(place, error.what());
+        report(place, error.what(), Severity::error);
     } catch (...) {
-        report(place, "a request failed");
+        report(place, "a request failed", Severity::error);
     }
 }
 
@@ -234,7 +234,11 @@ void Daemon::logLine(void* daemon, const char* format, std::va_list arguments) n
     // Most lines are about what single clients did; "Failed to create a new thread" is not.
     const bool isFailure = line.find("Failed") != std::string_view::npos;
     const bool isReported = !self.isStarted_ || (isFailure && self.lines_.allowsReport());
-    (isReported ? report : reportDetail)({"logLine", "Daemon", __LINE__}, line);
+    const Place place{"logLine", "Daemon", __LINE__};
+    if (isReported)
+        report(place, line);
+    else
+        reportDetail(place, line);
 }
 
 void Daemon::start(const Certificate* certificate)

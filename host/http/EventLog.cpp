@@ -2,7 +2,6 @@
 
 #include "host/http/EventLog.h"
 
-#include "platform/logging/RynLogger.h"
 #include "platform/text/Utf8.h"
 
 #include <algorithm>
@@ -14,7 +13,6 @@ namespace Host::Http {
 
 namespace {
 
-constexpr int levelOfMessages = 6000;
 constexpr int levelOfDetails = 4000;
 
 struct Range {
@@ -65,27 +63,24 @@ std::string legible(std::string_view text)
     return line;
 }
 
-void writeLine(const Place& place, int level, std::string_view text) noexcept
-{
-    try {
-        RynLog::RynLogger::logLevelMessage(
-            place.function, place.file, place.line, "Http", level, nullptr, 0, 0, legible(text));
-    } catch (...) {
-        return; // without memory the line is lost
-    }
-}
-
 } // namespace
 
-void report(const Place& place, std::string_view text) noexcept
-{
-    writeLine(place, levelOfMessages, text);
+// Without memory the line is lost.
+void report(const Place& place, std::string_view text, Severity severity) noexcept
+try {
+    RynLog::RynLogger::logMessage(
+        severity, place.function, place.file, place.line, "Http", legible(text));
+} catch (...) {
+    return;
 }
 
 void reportDetail(const Place& place, std::string_view text) noexcept
-{
+try {
     if (areDetailsLogged())
-        writeLine(place, levelOfDetails, text);
+        RynLog::RynLogger::logLevelMessage(place.function, place.file, place.line, "Http",
+            levelOfDetails, nullptr, 0, 0, legible(text));
+} catch (...) {
+    return;
 }
 
 bool areDetailsLogged() noexcept

@@ -6,10 +6,14 @@
 
 #pragma once
 
+#include "platform/logging/RynLogger.h"
+
 #include <string>
 #include <string_view>
 
 namespace Host::Http {
+
+using RynLog::Severity;
 
 struct Place {
     const char* function;
@@ -18,7 +22,8 @@ struct Place {
 };
 
 // Writes a message for the administrator.
-void report(const Place& place, std::string_view text) noexcept;
+void report(
+    const Place& place, std::string_view text, Severity severity = Severity::warning) noexcept;
 
 // Writes a detail about a single client or request. By default, the log level suppresses details.
 void reportDetail(const Place& place, std::string_view text) noexcept;

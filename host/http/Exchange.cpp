@@ -160,7 +160,8 @@ bool Exchange::execute()
     } catch (const std::bad_alloc&) {
         throw;
     } catch (const std::exception& error) {
-        report({"execute", "Exchange", __LINE__}, std::string("a request failed: ") + error.what());
+        report({"execute", "Exchange", __LINE__}, std::string("a request failed: ") + error.what(),
+            Severity::error);
         error_ = HttpError(MHD_HTTP_INTERNAL_SERVER_ERROR, "the request failed; the log tells why");
     }
     answer_.drop();

@@ -90,7 +90,8 @@ std::vector<ListeningSocket> listenOn(std::vector<Endpoint> endpoints)
             sockets.emplace_back(endpoint);
         } catch (const std::system_error& error) {
             if (endpoint.isOptional && isMissingAddress(error.code())) {
-                report({"listenOn", "ListeningSocket", __LINE__}, error.what());
+                report(
+                    {"listenOn", "ListeningSocket", __LINE__}, error.what(), Severity::information);
                 continue;
             }
             if (!isAnyPort || error.code() != std::errc::address_in_use)

@@ -129,7 +129,7 @@ std::optional<SignIns::Time> SignIns::tryPassword(const Credentials& credentials
     lock.unlock();
     if (isNew)
         report({"tryPassword", "SignIns", __LINE__},
-            "\"" + credentials.user + "\" signed in from " + address);
+            "\"" + credentials.user + "\" signed in from " + address, Severity::information);
     return std::nullopt;
 }
 

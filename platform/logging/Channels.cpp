@@ -18,8 +18,6 @@ namespace RynLog {
 
 namespace {
 
-constexpr int messageLevel = 6000;
-
 std::unique_ptr<spdlog::logger> makeLogger(const SinkSetting& setting)
 {
     auto sink = makeSink(setting);
@@ -58,7 +56,7 @@ void reportProblem(const Channels& channels, const std::string& problem)
 {
     const Origin origin{"reportProblem", "Channels", __LINE__};
     if (!problem.empty() && channels.log.isOpen() && channels.level <= messageLevel)
-        channels.log.write(messageLevel, origin, "RynLog", problem);
+        channels.log.write(messageLevel, Severity::warning, origin, "RynLog", problem);
 }
 
 // REQUIRES: the guard is held.
@@ -78,13 +76,32 @@ void configureAtFirstUse()
     install(std::move(channels));
 }
 
+spdlog::level::level_enum spdlogLevel(Severity severity)
+{
+    switch (severity) {
+    case Severity::error:
+        return spdlog::level::err;
+    case Severity::warning:
+        return spdlog::level::warn;
+    case Severity::information:
+        return spdlog::level::info;
+    case Severity::debug:
+        break;
+    }
+    return spdlog::level::debug;
+}
+
 } // namespace
 
-Channel::Channel(std::string name, const std::string& setting) : name_(std::move(name))
+Channel::Channel(std::string name, const std::string& setting, bool isBrief)
+    : name_(std::move(name))
 {
-    const auto parsed = parseSinkSetting(setting);
+    auto parsed = parseSinkSetting(setting);
     if (!parsed)
         throw std::invalid_argument("no such log sink: " + setting);
+    if (parsed->kind == SinkSetting::Kind::standardError && isStandardErrorTheJournal())
+        parsed->kind = SinkSetting::Kind::journal;
+    isBrief_ = isBrief && parsed->kind == SinkSetting::Kind::journal;
     try {
         logger_ = makeLogger(*parsed);
     } catch (const std::runtime_error& error) {
@@ -94,14 +111,14 @@ Channel::Channel(std::string name, const std::string& setting) : name_(std::move
 
 Channel::~Channel() = default;
 
-void Channel::write(
-    int level, const Origin& origin, std::string_view component, std::string_view text) const
+void Channel::write(int level, Severity severity, const Origin& origin, std::string_view component,
+    std::string_view text) const
 {
-    const std::string line = formatLine(name_, level, origin, component, text);
-    const auto severity = level >= messageLevel ? spdlog::level::warn : spdlog::level::debug;
+    const std::string line =
+        isBrief_ ? escaped(text) : formatLine(name_, level, origin, component, text);
     std::string problem;
     try {
-        logger_->log(severity, spdlog::string_view_t(line));
+        logger_->log(spdlogLevel(severity), spdlog::string_view_t(line));
     } catch (const std::runtime_error& error) {
         problem = error.what();
     }
@@ -125,7 +142,8 @@ void Channel::setProblem(std::string problem) const
 }
 
 Channels::Channels(const LogSettings& settings)
-    : level(settings.level), log("log", settings.log), trace("trace", settings.trace)
+    : level(settings.level), log("log", settings.log, settings.level >= messageLevel),
+      trace("trace", settings.trace, false)
 {
 }
 

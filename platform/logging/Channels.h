@@ -6,6 +6,7 @@
 
 #include "platform/logging/LineFormat.h"
 #include "platform/logging/LogSettings.h"
+#include "platform/logging/RynLogger.h"
 
 #include <memory>
 #include <mutex>
@@ -18,19 +19,23 @@ class logger;
 
 namespace RynLog {
 
+// The level of messages, the least important ones that are written by default.
+inline constexpr int messageLevel = 6000;
+
 // Writes lines under its name to a sink. Thread-safe.
 class Channel {
 public:
-    // Throws std::invalid_argument when the setting is invalid.
-    Channel(std::string name, const std::string& setting);
+    // In the journal, a brief channel writes messages without their origin. Throws
+    // std::invalid_argument when the setting is invalid.
+    Channel(std::string name, const std::string& setting, bool isBrief);
     ~Channel();
     Channel(const Channel&) = delete;
     Channel& operator=(const Channel&) = delete;
 
     bool isOpen() const noexcept { return logger_ != nullptr; }
 
-    void write(
-        int level, const Origin& origin, std::string_view component, std::string_view text) const;
+    void write(int level, Severity severity, const Origin& origin, std::string_view component,
+        std::string_view text) const;
 
     // Returns why the sink could not be opened or the last line not be written; empty without an
     // error.
@@ -40,6 +45,7 @@ private:
     void setProblem(std::string problem) const;
 
     std::string name_;
+    bool isBrief_;
     std::unique_ptr<spdlog::logger> logger_; // null when the channel is off
     mutable std::mutex guard_;               // for the members that follow
     mutable std::string problem_;

@@ -25,6 +25,13 @@ void appendEscaped(std::string& line, std::string_view text)
 
 } // namespace
 
+std::string escaped(std::string_view text)
+{
+    std::string line;
+    appendEscaped(line, text);
+    return line;
+}
+
 std::string formatLine(std::string_view channel, int level, const Origin& origin,
     std::string_view component, std::string_view text)
 {

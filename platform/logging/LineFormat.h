@@ -14,8 +14,10 @@ struct Origin {
     unsigned line;
 };
 
-// Returns "<channel> <level> <component> <function>(<file>:<line>) <text>". In each text a newline
-// is written as \n, another control character as \xNN and a backslash as \\.
+// Returns the text with a newline as \n, another control character as \xNN and a backslash as \\.
+std::string escaped(std::string_view text);
+
+// Returns "<channel> <level> <component> <function>(<file>:<line>) <text>" with each text escaped.
 std::string formatLine(std::string_view channel, int level, const Origin& origin,
     std::string_view component, std::string_view text);
 

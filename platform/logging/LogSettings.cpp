@@ -6,6 +6,9 @@
 #include <cstdlib>
 #include <string_view>
 
+#include <sys/stat.h>
+#include <unistd.h>
+
 namespace RynLog {
 
 namespace {
@@ -71,6 +74,14 @@ std::optional<SinkSetting> parseSinkSetting(const std::string& text)
     if (text.starts_with(filePrefix) && text.size() > filePrefix.size())
         return SinkSetting{SinkSetting::Kind::file, text.substr(filePrefix.size())};
     return std::nullopt;
+}
+
+bool isStandardErrorTheJournal()
+{
+    struct stat status {};
+    return ::fstat(STDERR_FILENO, &status) == 0 &&
+           environmentText("JOURNAL_STREAM") ==
+               std::to_string(status.st_dev) + ":" + std::to_string(status.st_ino);
 }
 
 LogSettings settingsFromEnvironment()

@@ -22,7 +22,7 @@ LogSettings settingsFromEnvironment();
 
 // The parsed value of RYNLOG_LOG or RYNLOG_TRACE.
 struct SinkSetting {
-    enum class Kind { off, syslog, standardError, file };
+    enum class Kind { off, syslog, standardError, journal, file };
 
     Kind kind = Kind::off;
     std::string path{}; // of a file; never empty for one
@@ -31,10 +31,15 @@ struct SinkSetting {
 // Parses syslog, stderr, file:PATH and off; returns nothing for any other text.
 std::optional<SinkSetting> parseSinkSetting(const std::string& text);
 
+// Returns whether systemd has connected standard error to the journal (JOURNAL_STREAM in
+// systemd.exec(5)).
+bool isStandardErrorTheJournal();
+
 // Replaces the settings in effect, which are at first those of the environment. Lines that other
 // threads are writing are finished with the settings they began with. A `problem` becomes the first
 // line of the log channel. A file is created when missing and always appended to; it stays open
-// until the next call or until the library is unloaded. One that cannot be opened or written is
+// until it is replaced, as by a rotation, until the next call or until the library is unloaded. One
+// that cannot be opened or written is
 // reported to syslog, once, and the lines of its channel are lost. Throws std::invalid_argument
 // naming an invalid sink; nothing is replaced then.
 void configure(const LogSettings& settings);

@@ -4,6 +4,7 @@
 
 #include <cerrno>
 #include <climits>
+#include <cstdlib>
 #include <ctime>
 
 #include <poll.h>
@@ -64,6 +65,13 @@ int writeToStandardError(std::string_view text) noexcept
         text.remove_prefix(piece.size());
     }
     return error;
+}
+
+void reportToStandardError(std::string_view text) noexcept
+{
+    const char* const setting = ::secure_getenv("RYNLOG_STDERR");
+    if (setting == nullptr || std::string_view(setting) != "off")
+        writeToStandardError(text);
 }
 
 } // namespace RynLog

@@ -35,4 +35,7 @@ int writeWhole(int descriptor, std::string_view bytes) noexcept;
 // bytes is one write, so that lines of several threads are not interleaved.
 int writeToStandardError(std::string_view text) noexcept;
 
+// Does the same, unless RYNLOG_STDERR is `off`, as in programs that report failures themselves.
+void reportToStandardError(std::string_view text) noexcept;
+
 } // namespace RynLog

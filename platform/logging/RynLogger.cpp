@@ -8,14 +8,19 @@ namespace RynLog {
 
 namespace {
 
-void write(Channel Channels::*channel, int level, const Origin& origin,
+Severity severityOf(int level)
+{
+    return level >= messageLevel ? Severity::warning : Severity::debug;
+}
+
+void write(Channel Channels::*channel, int level, Severity severity, const Origin& origin,
     const std::string& component, const std::string& text) noexcept
 try {
     if (!anyChannelWants(level))
         return;
     const auto channels = activeChannels();
     if (channels && level >= channels->level && ((*channels).*channel).isOpen())
-        ((*channels).*channel).write(level, origin, component, text);
+        ((*channels).*channel).write(level, severity, origin, component, text);
 } catch (...) {
     // The line is lost: diagnostics never make their caller fail.
 }
@@ -26,14 +31,20 @@ void RynLogger::logLevelMessage(const char* function, const char* file, unsigned
     const std::string& component, int level, const char*, int, int,
     const std::string& text) noexcept
 {
-    write(&Channels::log, level, {function, file, line}, component, text);
+    write(&Channels::log, level, severityOf(level), {function, file, line}, component, text);
+}
+
+void RynLogger::logMessage(Severity severity, const char* function, const char* file, unsigned line,
+    const std::string& component, const std::string& text) noexcept
+{
+    write(&Channels::log, messageLevel, severity, {function, file, line}, component, text);
 }
 
 void RynLogger::traceLevelMessage(const char* function, const char* file, unsigned line,
     const std::string& component, int level, const char*, int, int,
     const std::string& text) noexcept
 {
-    write(&Channels::trace, level, {function, file, line}, component, text);
+    write(&Channels::trace, level, severityOf(level), {function, file, line}, component, text);
 }
 
 bool RynLogger::isWanted(int level) noexcept

@@ -8,6 +8,9 @@
 
 namespace RynLog {
 
+// How important a line is to syslog and the journal, numbered as in RFC 5424.
+enum class Severity { error = 3, warning = 4, information = 6, debug = 7 };
+
 // Levels in use: 3000 marks with parameters, 4000 marks without, 6000 messages; a higher
 // number is more important. Lines below the wanted level are dropped.
 //
@@ -22,6 +25,9 @@ namespace RynLog {
 // (syslog has a clock of its own); facility daemon, severity warning from level 6000 up, debug
 // below. The identity under which the process writes to syslog is left as the process set it.
 //
+// Where standard error is the systemd journal, the line begins with its severity (sd-daemon(3)) and
+// has no time; messages of the log channel are the text alone, unless lower levels are written, too.
+//
 // Every function may be called from any thread and never throws: a line that cannot be
 // written is lost. A null text is written as (null).
 class RynLogger {
@@ -32,7 +38,11 @@ public:
         const std::string& component, int level, const char* reservedText, int reservedFirst,
         int reservedSecond, const std::string& text) noexcept;
 
-    // Writes one line to the trace channel, with the same arguments.
+    // Writes a message (level 6000) of another severity than a warning to the log channel.
+    static void logMessage(Severity severity, const char* function, const char* file, unsigned line,
+        const std::string& component, const std::string& text) noexcept;
+
+    // Writes one line to the trace channel, with the same arguments as logLevelMessage().
     static void traceLevelMessage(const char* function, const char* file, unsigned line,
         const std::string& component, int level, const char* reservedText, int reservedFirst,
         int reservedSecond, const std::string& text) noexcept;

@@ -11,6 +11,7 @@
 #include <array>
 #include <csignal>
 #include <ctime>
+#include <filesystem>
 #include <limits>
 #include <regex>
 
@@ -133,6 +134,44 @@ TEST(FileSinkTest, NullTextsAreWrittenAsNull)
     const ScopedLogSettings settings({6000, file.sink(), "off"});
     RynLogger::logLevelMessage(nullptr, nullptr, 1, "", 6000, nullptr, 0, 0, "");
     EXPECT_THAT(file.lines(), ElementsAre(EndsWith(" log 6000  (null)((null):1) ")));
+}
+
+TEST(FileSinkTest, AFileThatIsRotatedAwayIsOpenedAnew)
+{
+    const LogFile file;
+    const ScopedLogSettings settings({6000, file.sink(), "off"});
+    logLine("first");
+    std::filesystem::rename(file.path(), file.path() + ".1");
+    logLine("second");
+    EXPECT_THAT(file.lines(), ElementsAre(EndsWith("second")));
+    std::filesystem::remove(file.path());
+    logLine("third");
+    EXPECT_THAT(file.lines(), ElementsAre(EndsWith("third")));
+    EXPECT_THAT(
+        Testing::linesOf(Testing::contentOf(file.path() + ".1")), ElementsAre(EndsWith("first")));
+}
+
+TEST(FileSinkTest, ARelativePathStaysThatOfTheFirstFolder)
+{
+    const Testing::TemporaryFolder first, second;
+    const auto before = std::filesystem::current_path();
+    std::filesystem::current_path(first.path());
+    const ScopedLogSettings settings({6000, "file:lines", "off"});
+    std::filesystem::current_path(second.path());
+    logLine("text");
+    std::filesystem::current_path(before);
+    EXPECT_THAT(Testing::linesOf(Testing::contentOf((first.path() / "lines").string())), SizeIs(1));
+    EXPECT_TRUE(std::filesystem::is_empty(second.path()));
+}
+
+TEST(FileSinkTest, AFileThatCannotBeOpenedAnewIsKept)
+{
+    const LogFile file;
+    const ScopedLogSettings settings({6000, file.sink(), "off"});
+    std::filesystem::rename(file.path(), file.path() + ".1");
+    std::filesystem::create_directory(file.path());
+    logLine("text");
+    EXPECT_THAT(Testing::linesOf(Testing::contentOf(file.path() + ".1")), SizeIs(1));
 }
 
 TEST(FileSinkTest, APipeThatNobodyReadsIsNotWaitedFor)

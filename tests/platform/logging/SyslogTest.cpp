@@ -14,7 +14,9 @@ using Testing::logLine;
 using Testing::ScopedLogSettings;
 using Testing::takeSyslogLines;
 
-// RFC 5424: facility 3 (daemon) times 8, severity 4 (warning) and 7 (debug).
+// RFC 5424: facility 3 (daemon) times 8, and the severity.
+constexpr int daemonError = 3 * 8 + 3;
+constexpr int daemonInformation = 3 * 8 + 6;
 constexpr int daemonWarning = 3 * 8 + 4;
 constexpr int daemonDebug = 3 * 8 + 7;
 
@@ -43,6 +45,17 @@ TEST_F(SyslogSinkTest, MessagesAreWarningsAndMarksAreDebug)
     EXPECT_EQ(lines[1].priority, daemonDebug);
     EXPECT_EQ(lines[2].priority, daemonWarning);
     EXPECT_EQ(lines[3].priority, daemonWarning);
+}
+
+TEST_F(SyslogSinkTest, MessagesHaveTheirSeverity)
+{
+    const ScopedLogSettings settings({6000, "syslog", "off"});
+    for (const auto severity : {RynLog::Severity::error, RynLog::Severity::information})
+        RynLog::RynLogger::logMessage(severity, "f", "F", 1, "Http", "text");
+    const auto lines = takeSyslogLines();
+    ASSERT_EQ(lines.size(), 2U);
+    EXPECT_EQ(lines[0].priority, daemonError);
+    EXPECT_EQ(lines[1].priority, daemonInformation);
 }
 
 TEST_F(SyslogSinkTest, TextIsNotTakenAsAFormatAndIsEscaped)
