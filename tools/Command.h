@@ -40,6 +40,9 @@ public:
     // the given one unless the command has other conventions.
     virtual ExitCode reportFailure(Output& out, const std::string& reason, ExitCode code) const;
 
+    // Returns whether the libraries' log is a result of the command. It is collected otherwise.
+    virtual bool writesLog() const { return false; }
+
 protected:
     CLI::App& parser() const { return *parser_; }
 

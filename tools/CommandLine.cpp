@@ -3,6 +3,8 @@
 #include "tools/CommandLine.h"
 
 #include "tools/Command.h"
+#include "tools/EmptyMachine.h"
+#include "tools/LibraryLog.h"
 #include "tools/UsageError.h"
 #include "tools/commands/Commands.h"
 #include "tools/output/Output.h"
@@ -72,6 +74,35 @@ ExitCode refuse(
     return ExitCode::wrongUsage;
 }
 
+// Writes the messages to standard error, but for those that contain a text that is written anyway.
+void tell(const std::vector<std::string>& messages, const std::string& known)
+{
+    for (const std::string& message : messages)
+        if (known.empty() || message.find(known) == std::string::npos)
+            writeAll(STDERR_FILENO, message + "\n");
+}
+
+// Runs a command, and tells what its libraries logged.
+ExitCode runCommand(Command& command, Output& out)
+{
+    if (command.writesLog())
+        return command.run(out);
+    const LibraryLog log;
+    try {
+        const ExitCode code = command.run(out);
+        out.flush();
+        tell(log.messages(), "");
+        for (const std::string& message : refusedSensors())
+            complain(message);
+        return code;
+    } catch (const UsageError&) {
+        throw;
+    } catch (const std::exception& error) {
+        tell(log.messages(), error.what());
+        throw;
+    }
+}
+
 ExitCode print(Output& out, const std::string& text)
 {
     out.write(text);
@@ -103,9 +134,7 @@ ExitCode run(int argc, const char* const* argv)
     if (command == nullptr)
         return refuse(tool, nullptr, out, "a command is missing");
     try {
-        const ExitCode code = command->run(out);
-        out.flush();
-        return code;
+        return runCommand(*command, out);
     } catch (const UsageError& error) {
         return refuse(tool, command, out, error.what());
     } catch (const std::exception& error) {

@@ -3,6 +3,7 @@
 #include "tools/EmptyMachine.h"
 
 #include "platform/instrumentation/Instrumentation.h"
+#include "tools/SourceOptions.h"
 #include "tools/output/Output.h"
 
 #include <stdexcept>
@@ -15,7 +16,9 @@ namespace {
 
 struct Look {
     std::size_t count = 0;
-    std::string nameless; // the path of a sensor without a description, which no provider accepts
+    // The path of the first sensor of a type without a description, which no provider accepts. It
+    // publishes no sensor of the type after it.
+    std::vector<std::string> nameless;
 };
 
 Look lookAtMachine()
@@ -23,9 +26,12 @@ Look lookAtMachine()
     Look look;
     for (const NodeType type : {NodeType::Temperature, NodeType::Voltage, NodeType::Tachometer}) {
         Vorn::Instrumentation cursor;
+        bool isComplete = true;
         for (cursor.selectNode(type); cursor; ++cursor, ++look.count)
-            if (look.nameless.empty() && cursor.getNodeDescription().empty())
-                look.nameless = cursor.convertPathToString(cursor.getPathToNode());
+            if (isComplete && cursor.getNodeDescription().empty()) {
+                look.nameless.push_back(cursor.convertPathToString(cursor.getPathToNode()));
+                isComplete = false;
+            }
     }
     return look;
 }
@@ -52,9 +58,19 @@ void checkMachineIsEmpty()
     if (look.count == 0)
         return;
     const std::string reason =
-        look.nameless.empty() ? "" : ": " + look.nameless + " has no description";
+        look.nameless.empty() ? "" : ": " + look.nameless.front() + " has no description";
     throw std::runtime_error("the machine has " + std::to_string(look.count) +
                              " sensors, of which the provider shows none" + reason);
+}
+
+std::vector<std::string> refusedSensors()
+{
+    std::vector<std::string> messages;
+    if (!SourceOptions::readsHwmon())
+        for (const std::string& path : lookAtMachine().nameless)
+            messages.push_back(path + " has no description: it is left out, and so are the sensors "
+                                      "of its kind after it");
+    return messages;
 }
 
 ExitCode complainOfEmptyMachine(const std::optional<std::string>& model)

@@ -10,6 +10,7 @@
 #include <cstddef>
 #include <optional>
 #include <string>
+#include <vector>
 
 namespace Tools {
 
@@ -23,12 +24,17 @@ std::size_t countSensors();
 // REQUIRES: no provider is loaded.
 void checkMachineIsEmpty();
 
+// Returns a message for each sensor without a description, where the machine is one of model files:
+// no provider publishes it. REQUIRES: no provider is loaded, and SourceOptions::selectMachine() was
+// called.
+std::vector<std::string> refusedSensors();
+
 // Writes to standard error that the machine, or the model file, has no sensors.
 ExitCode complainOfEmptyMachine(const std::optional<std::string>& model);
 
 // Writes to standard error why there is no object, with the command lines for sensors to choose
 // from. Calls checkMachineIsEmpty() where the machine has no sensors.
-ExitCode complainOfNoObject(const ObjectFound& found, const std::string& command,
-    const std::optional<std::string>& model);
+ExitCode complainOfNoObject(
+    const ObjectFound& found, const std::string& command, const std::optional<std::string>& model);
 
 } // namespace Tools

@@ -38,7 +38,7 @@ void SourceOptions::selectMachine() const
     ::setenv("VORN_INSTRUMENTATION", entry.c_str(), 1);
 }
 
-bool SourceOptions::readsHwmon() const
+bool SourceOptions::readsHwmon()
 {
     const char* const sources = std::getenv("VORN_INSTRUMENTATION");
     if (sources == nullptr || *sources == '\0')

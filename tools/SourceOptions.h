@@ -30,7 +30,7 @@ public:
     void selectMachine() const;
 
     // Returns whether the sensors are those of the kernel. REQUIRES: selectMachine() was called.
-    bool readsHwmon() const;
+    static bool readsHwmon();
 
     // Throws std::runtime_error when no library is given and none is found.
     ProviderFiles providerFiles() const;

@@ -9,8 +9,8 @@
 namespace {
 
 using testing::AllOf;
-using testing::EndsWith;
 using testing::HasSubstr;
+using testing::Not;
 using testing::StartsWith;
 using namespace Testing;
 
@@ -97,11 +97,12 @@ TEST_F(FailureTest, InstrumentationThatCannotBeUsedIsTheReason)
     for (const std::vector<std::string>& arguments : std::vector<std::vector<std::string>>{{"list"},
              {"list", "--cim"}, {"list", "ZUMLO_SensorSystemDevice"}, {"get", "CPU 1"}, {"record"},
              {"walk"}, {"walk", "CPU 1"}}) {
-        const Ended ended = run(arguments, {.environment = {{"VORN_INSTRUMENTATION", "abacus"}}});
+        const Ended ended = run(
+            arguments, {.environment = {{"VORN_INSTRUMENTATION", "abacus"}, {"RYNLOG_LOG", ""}}});
         EXPECT_EQ(ended.code, 1);
         EXPECT_EQ(ended.out, "");
-        EXPECT_THAT(
-            linesOf(ended.err).back(), AllOf(StartsWith("sensorctl: "), HasSubstr("\"abacus\"")));
+        EXPECT_THAT(ended.err, AllOf(StartsWith("sensorctl: "), HasSubstr("\"abacus\"")));
+        EXPECT_EQ(linesOf(ended.err).size(), 1U) << ended.err;
     }
 }
 
@@ -112,8 +113,30 @@ TEST_F(FailureTest, SensorsThatTheProviderRefusesAreTheReason)
     const Ended ended = run({"list", "--model", file});
     EXPECT_EQ(ended.code, 1);
     EXPECT_EQ(ended.out, "");
-    EXPECT_THAT(ended.err, EndsWith("sensorctl: the machine has 1 sensors, of which the provider "
-                                    "shows none: /board/in1 has no description\n"));
+    EXPECT_EQ(ended.err, "sensorctl: the machine has 1 sensors, of which the provider shows none: "
+                         "/board/in1 has no description\n");
+}
+
+TEST_F(FailureTest, SensorsThatAreLeftOutAreNamed)
+{
+    const std::string file = model(R"(
+        { "type": "voltage", "path": "/board/in1", "description": "" },
+        { "type": "voltage", "path": "/board/in2", "description": "12 V" },
+        { "type": "temperature", "path": "/board/temp1", "description": "CPU" })");
+    const Ended ended = run({"list", "--flat", "--model", file});
+    EXPECT_EQ(ended.code, 0);
+    EXPECT_THAT(ended.out, AllOf(HasSubstr("CPU"), Not(HasSubstr("12 V"))));
+    EXPECT_EQ(ended.err, "sensorctl: /board/in1 has no description: it is left out, and so are the "
+                         "sensors of its kind after it\n");
+}
+
+TEST_F(FailureTest, LogGoesWhereItsSettingSays)
+{
+    const std::string log = (folder_.path() / "log").string();
+    const Ended ended = run({"list"},
+        {.environment = {{"VORN_INSTRUMENTATION", "abacus"}, {"RYNLOG_LOG", "file:" + log}}});
+    EXPECT_EQ(linesOf(ended.err).size(), 1U) << ended.err;
+    EXPECT_THAT(contentOf(log), HasSubstr("source \"abacus\""));
 }
 
 TEST_F(FailureTest, ToolWithoutItsProviderSaysWhereItLooked)

@@ -10,6 +10,7 @@
 #include <nlohmann/json.hpp>
 
 #include <cmath>
+#include <cstdlib>
 #include <map>
 #include <tuple>
 
@@ -212,6 +213,34 @@ TEST_F(HwmonAbsentTest, SensorsConfigurationIsHonoured)
     const auto sensors = listedSensors();
     EXPECT_TRUE(sensors.contains("Front fan:/hwmon/nct6798-isa-0290/fan1"));
     EXPECT_FALSE(sensors.contains("fan2:/hwmon/nct6798-isa-0290/fan2"));
+}
+
+// Returns what a command writes to standard error.
+std::string standardErrorOf(const std::string& command)
+{
+    const TemporaryFolder folder;
+    const std::string file = (folder.path() / "err").string();
+    EXPECT_EQ(std::system((command + " >/dev/null 2>'" + file + "'").c_str()) & 0xFF, 0);
+    return contentOf(file);
+}
+
+class ConfigurationMistakesTest : public MountNamespaceTest {};
+
+TEST_F(ConfigurationMistakesTest, AreToldOnceInTheWordsOfSensors)
+{
+    const BoundSysfs sysfs("desktop");
+    const BoundSensorsConfiguration configuration("chip \"*-*\"\n"
+                                                  "  lable temp1 \"First\"\n"
+                                                  "  compute in0 @*(\n"
+                                                  "bus \"i2c-99\" \"gone\n");
+    const std::string expected = standardErrorOf("/usr/bin/sensors");
+    EXPECT_NE(expected.find("Error: File /etc/sensors3.conf, line 2: "), std::string::npos)
+        << expected;
+    for (const char* const command : {"list", "walk", "record"}) {
+        const Ended ended = run({command}, {.environment = {{"RYNLOG_LOG", ""}}});
+        EXPECT_EQ(ended.code, 0);
+        EXPECT_EQ(ended.err, expected) << command;
+    }
 }
 
 } // namespace

@@ -2,6 +2,7 @@
 
 #include "tools/output/Output.h"
 
+#include "platform/logging/LogSettings.h"
 #include "tools/output/Terminal.h"
 #include "tools/output/Utf8.h"
 
@@ -63,7 +64,8 @@ void Output::flush()
 void complain(std::string_view text, const std::vector<std::string>& lines) noexcept
 {
     try {
-        std::string message = "sensorctl: " + printable(text, isUtf8Locale()) + "\n";
+        std::string message = RynLog::isStandardErrorTheJournal() ? "<3>" : "";
+        message += "sensorctl: " + printable(text, isUtf8Locale()) + "\n";
         for (const std::string& line : lines)
             message += "  " + printable(line, isUtf8Locale()) + "\n";
         writeAll(STDERR_FILENO, message);

@@ -139,15 +139,15 @@ ComputeLines ChipList::initialise(const SensorsConfiguration& configuration)
     return {text, !errors.list().empty()};
 }
 
-// Reports the errors that the previous call did not have: each new list of chips comes with a new
-// reading of the same configuration.
+// Reports the errors in the words of sensors(1), but for those that the previous call had: each new
+// list of chips comes with a new reading of the same configuration.
 void ChipList::reportOnce(const std::vector<LibsensorsHooks::ParseError>& errors,
     const SensorsConfiguration& configuration)
 {
     std::vector<std::string> texts;
     for (const LibsensorsHooks::ParseError& error : errors) {
         const std::string& text =
-            texts.emplace_back(configuration.place(error.line) + ": " + error.text);
+            texts.emplace_back("Error: " + configuration.place(error.line) + ": " + error.text);
         if (std::find(reported_.begin(), reported_.end(), text) == reported_.end())
             report("ChipList", text);
     }

@@ -83,7 +83,7 @@ std::string SensorsConfiguration::place(int line) const
     if (after == parts_.begin())
         return "sensors configuration";
     const Part& part = *std::prev(after);
-    return part.file + ":" + std::to_string(line - part.firstLine + 1);
+    return "File " + part.file + ", line " + std::to_string(line - part.firstLine + 1);
 }
 
 } // namespace Vorn::Hwmon

@@ -23,7 +23,7 @@ public:
     const std::string& text() const { return text_; }
 
     // Returns the place that a line of the text, counted from 1, comes from, such as
-    // "/etc/sensors3.conf:12".
+    // "File /etc/sensors3.conf, line 12".
     std::string place(int line) const;
 
 private:

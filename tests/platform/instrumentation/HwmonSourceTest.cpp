@@ -190,7 +190,7 @@ TEST_F(HwmonTest, AWrongConfigurationIsReportedOnceAndTheRestHolds)
     chip.sysfs().addChip("hwmon7", "other", "platform", "other.1"); // the list is renewed
     walk();
     ASSERT_THAT(capture.log(), SizeIs(1));
-    EXPECT_THAT(capture.log()[0].text, HasSubstr("/etc/sensors3.conf:3: "));
+    EXPECT_THAT(capture.log()[0].text, HasSubstr("Error: File /etc/sensors3.conf, line 3: "));
     EXPECT_EQ(capture.log()[0].component, "Nimbrel.Instrumentation");
     EXPECT_EQ(capture.log()[0].level, 6000);
 }
@@ -205,7 +205,7 @@ TEST_F(HwmonTest, AConfigurationMayBeWrongFromTheFirstLineOnThoughItIsReadAgain)
         chip.sysfs().addChip("hwmon" + other, other, "platform", other + ".1");
     }
     ASSERT_THAT(capture.log(), SizeIs(1));
-    EXPECT_EQ(capture.log()[0].text, "/etc/sensors3.conf:2: Parse error in chip name");
+    EXPECT_EQ(capture.log()[0].text, "Error: File /etc/sensors3.conf, line 2: Parse error in chip name");
 }
 
 TEST_F(HwmonTest, TheFolderOfConfigurationsAddsToTheFile)
@@ -218,7 +218,7 @@ TEST_F(HwmonTest, TheFolderOfConfigurationsAddsToTheFile)
     const Testing::BindMount bound(folder.path(), "/etc/sensors.d");
     EXPECT_EQ(nodeOf({{"temp1_input", "20000"}}).description, "First");
     ASSERT_THAT(capture.log(), SizeIs(1));
-    EXPECT_THAT(capture.log()[0].text, HasSubstr("/etc/sensors.d/20-wrong.conf:3: "));
+    EXPECT_THAT(capture.log()[0].text, HasSubstr("Error: File /etc/sensors.d/20-wrong.conf, line 3: "));
 }
 
 TEST_F(HwmonTest, AConfigurationThatCannotBeReadIsNamed)
