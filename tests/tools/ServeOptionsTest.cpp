@@ -5,6 +5,7 @@
 #include "tools/serve/ServeOptions.h"
 #include "tests/support/ErrorOf.h"
 #include "tests/support/TemporaryFolder.h"
+#include "tests/support/Texts.h"
 
 #include <CLI/CLI.hpp>
 #include <gmock/gmock.h>
@@ -94,16 +95,25 @@ protected:
     Testing::TemporaryFolder folder_;
 };
 
-TEST_F(ServeOptionsTest, EveryLimitHasItsDefaultAndTellsIt)
+// Returns the name of an option in the source of a manual page.
+std::string inManual(std::string name)
 {
-    CLI::App parser;
-    Tools::ServeOptions options;
-    options.addTo(parser);
-    const std::string help = parser.help();
-    EXPECT_EQ(valuesOf(options), defaults());
-    for (const Limit& limit : limits)
-        EXPECT_THAT(help, testing::ContainsRegex("--" + limit.name + " [A-Z]+=" +
-                                                 std::to_string(limit.byDefault) + "[ \n]"));
+    for (std::size_t at = 0; (at = name.find('-', at)) != std::string::npos; at += 2)
+        name.insert(at, "\\");
+    return "\n.It Fl \\-" + name + " ";
+}
+
+TEST_F(ServeOptionsTest, EveryLimitHasTheDefaultThatTheManualTells)
+{
+    EXPECT_EQ(valuesOf(Tools::ServeOptions()), defaults());
+    const std::string page =
+        Testing::contentOf(SENSOR_PROFILE_SOURCE_DIR "/packaging/man/sensorctl.1");
+    for (const Limit& limit : limits) {
+        const std::size_t begin = page.find(inManual(limit.name));
+        ASSERT_NE(begin, std::string::npos) << limit.name;
+        EXPECT_THAT(page.substr(begin, page.find("\n.", begin + 1) - begin),
+            testing::ContainsRegex("[ (]" + std::to_string(limit.byDefault) + "($|[,;).])"));
+    }
 }
 
 TEST_F(ServeOptionsTest, EveryLimitIsAnOptionAndASetting)

@@ -175,6 +175,42 @@ TEST_F(ServeProcessTest, ServiceManagerIsToldWhatItDoes)
     EXPECT_EQ(manager.told(), "STOPPING=1");
 }
 
+TEST_F(ServeProcessTest, JournalGetsPrioritiesAndNoSecondTime)
+{
+    ServerProcess server(withModel({"--passwords", secret("passwords", userLine)}), {},
+        script("JOURNAL_STREAM=$(stat --dereference --format=%d:%i /dev/stderr) exec " + sensorctl +
+               " \"$@\""));
+    folder_.write("passwords", "ann\n");
+    server.signal(SIGHUP);
+    EXPECT_TRUE(server.waitForLog("stays in force"));
+    const Ended ended = server.end(SIGTERM);
+    EXPECT_THAT(linesOf(ended.err),
+        testing::ElementsAre(testing::StartsWith("<6>serving as "),
+            testing::ContainsRegex("^<3>.*/passwords:1: .*stays in force$"), "<6>ending"));
+}
+
+TEST_F(ServeProcessTest, JournalGetsThePriorityOfTheLastMessage)
+{
+    const Ended ended = run({"serve", "--model", "/no/such/model"},
+        {.program = script("JOURNAL_STREAM=$(stat --dereference --format=%d:%i /dev/stderr) exec " +
+                           sensorctl + " \"$@\"")});
+    EXPECT_EQ(ended.code, 1);
+    EXPECT_THAT(ended.err, testing::StartsWith("<3>sensorctl: model file /no/such/model: "));
+}
+
+TEST_F(ServeProcessTest, UserIsNamed)
+{
+    if (::geteuid() != 0)
+        return cannotRun("only root can start it as another user");
+    const std::string file = smallModel();
+    ::chmod(folder_.path().c_str(), 0711);
+    ::chmod(file.c_str(), 0444);
+    const ServerProcess server({"--model", file, "--user", "nobody"}, {},
+        script(
+            "exec setpriv --reuid=nobody --regid=nogroup --clear-groups " + sensorctl + " \"$@\""));
+    EXPECT_TRUE(server.waitForLog("serving as nobody\n"));
+}
+
 TEST_F(ServeProcessTest, RootIsRenounced)
 {
     if (::geteuid() != 0)

@@ -191,10 +191,48 @@ TEST_F(ServeTest, HelpTellsTheDefaults)
 {
     const Ended ended = run({"serve", "--help"});
     EXPECT_EQ(ended.code, 0);
-    for (const std::string text : {"127.0.0.1", "::1", "--port PORT=5988", "--tls-port PORT=5989",
-             "default: no TLS", "default: anybody", "sensor-profile if there is such a user",
-             "--max-body BYTES=1048576"})
+    for (const std::string text :
+        {"127.0.0.1", "::1", "--port N=5988", "--tls-port N=5989", "default: everybody"})
         EXPECT_THAT(ended.out, HasSubstr(text));
+}
+
+TEST_F(ServeTest, HelpFitsOnAScreen)
+{
+    constexpr std::size_t rows = 24;
+    EXPECT_LT(linesOf(run({"serve", "--help"}).out).size(), rows);
+}
+
+TEST_F(ServeTest, MistakesInTheCommandLineComeFirst)
+{
+    const Ended ended = failing({"--address", "192.0.2.1", "--model", "/no/such/model",
+        "--certificate", "/no/such/file", "--key", "/no/such/file"});
+    EXPECT_EQ(ended.code, 2);
+    EXPECT_THAT(ended.err, StartsWith("sensorctl: other machines can reach 192.0.2.1, "))
+        << ended.err;
+    EXPECT_EQ(linesOf(ended.err).size(), 1U) << ended.err;
+}
+
+TEST_F(ServeTest, CheckReadsTheFilesAndServesNobody)
+{
+    const std::string passwords = secret("passwords", userLine);
+    const Ended right = failing(encrypted("localhost", {"--passwords", passwords, "--check"}));
+    EXPECT_EQ(right.code, 0);
+    EXPECT_EQ(right.out + right.err, "");
+    folder_.write("passwords", "ann\n");
+    const Ended wrong = failing(withModel({"--passwords", passwords, "--check"}));
+    EXPECT_EQ(wrong.code, 1);
+    EXPECT_THAT(wrong.err, StartsWith("sensorctl: " + passwords + ":1: "));
+    const std::string settings = folder_.write("serve.conf", "prot = 1\n");
+    EXPECT_EQ(failing(withModel({"--config", settings, "--check"})).code, 2);
+}
+
+TEST_F(ServeTest, SensorsThatTheProviderRefusesLeaveNoLineWithoutAReason)
+{
+    ServerProcess server(
+        {"--model", model(R"({ "type": "voltage", "path": "/a", "description": "" },
+        { "type": "temperature", "path": "/b", "description": "T" })")});
+    EXPECT_EQ(sensorsIn(ask(HttpClient(server.port())).body), 1U);
+    EXPECT_THAT(server.end(SIGTERM).err, testing::Not(HasSubstr("exception")));
 }
 
 TEST_F(ServeTest, HangupReadsPasswordsAndCertificateAgain)
@@ -257,6 +295,7 @@ TEST_F(ServeTest, MistakesInTheConfigurationFileAreNamedWithTheirLine)
     EXPECT_EQ(problem("prot = 1"), "serve.conf:2: there is no setting \"prot\"");
     EXPECT_EQ(problem("config = x"), "serve.conf:2: there is no setting \"config\"");
     EXPECT_EQ(problem("help = 1"), "serve.conf:2: there is no setting \"help\"");
+    EXPECT_EQ(problem("check = 1"), "serve.conf:2: there is no setting \"check\"");
     EXPECT_EQ(problem("port"), "serve.conf:2: it is no `name = value`");
     EXPECT_EQ(problem("port ="), "serve.conf:2: port has no value");
     EXPECT_EQ(problem("port = 1\nport = 2"), "serve.conf:3: a second line for port");

@@ -37,26 +37,19 @@ namespace Tools {
 namespace {
 
 using Host::Http::report;
+using Host::Http::Severity;
 
 constexpr const char* serveFooter =
-    "Loopback addresses are served without TLS, and with it where there is a\n"
-    "certificate. All others need --certificate, --key and --passwords.\n"
-    "\n"
-    "A password file has a line `user:hash` for each user; `mkpasswd` makes the hash,\n"
-    "by yescrypt, bcrypt or sha512crypt. A configuration file has lines of\n"
-    "`name = value`, with the names of the options without the dashes before them,\n"
-    "such as `max-body = 65536`.\n"
-    "\n"
-    "SIGTERM and SIGINT let requests that run come to their end; a second one does\n"
-    "not. SIGHUP reads the certificate, the key and the passwords again, as the user\n"
-    "that the server runs as.\n"
-    "\n"
-    "The log goes to standard error, or where RYNLOG_LOG says: syslog, file:PATH or\n"
-    "off. The server does not start where it cannot be written.";
+    "Addresses other than loopback need --certificate, --key and --passwords. A file\n"
+    "of passwords has lines of `user:hash`, a configuration file of `name = value`.\n"
+    "SIGTERM ends the server; SIGHUP has it read certificate, key and passwords anew.\n"
+    "`man sensorctl` describes these files, the log and the limits of clients.";
 
-// Sets the environment, since the libraries of the providers have logs of their own.
+// Sets the environment, since the libraries of the providers have logs of their own. The log has
+// the reasons of failures that they report to standard error.
 void logToStandardError()
 {
+    ::setenv("RYNLOG_STDERR", "off", 0);
     const char* const wanted = ::getenv("RYNLOG_LOG");
     if (wanted == nullptr || *wanted == '\0')
         ::setenv("RYNLOG_LOG", "stderr", 1);
@@ -100,7 +93,7 @@ std::vector<std::string> modelFiles()
 // does not start without a log. A running server continues when the log fails.
 void beginLog(const std::string& text, Output& out)
 {
-    report({"beginLog", "ServeCommand", __LINE__}, text);
+    report({"beginLog", "ServeCommand", __LINE__}, text, Severity::information);
     const std::string problem = Host::Http::logProblem();
     if (problem.empty())
         return;
@@ -124,7 +117,7 @@ bool serve(Host::Http::Server& server, const Protection& protection, const Signa
     }
     notifyServiceManager("STOPPING=1");
     server.beginShutdown();
-    report({"serve", "ServeCommand", __LINE__}, "ending");
+    report({"serve", "ServeCommand", __LINE__}, "ending", Severity::information);
     constexpr std::chrono::milliseconds interval{20};
     const auto end = std::chrono::steady_clock::now() + gracePeriod;
     while (!server.waitUntilIdle(interval)) {
@@ -148,17 +141,21 @@ public:
         parser().footer(serveFooter);
     }
 
+    bool writesLog() const override { return true; }
+
     ExitCode run(Output& out) override
     {
         options_.complete(parser());
+        const auto endpoints = endpointsFor(options_);
         logToStandardError();
         source_.selectMachine();
         // Slow chips do not delay each other, unless the environment names the sources.
         ::setenv("VORN_INSTRUMENTATION", "hwmon:parallel", 0);
         const Signals signals; // before any thread starts
-        keepFreedMemory(options_.http.workers);
-        const auto endpoints = endpointsFor(options_);
         const Protection protection(options_);
+        if (options_.isCheck)
+            return ExitCode::success;
+        keepFreedMemory(options_.http.workers);
         auto sockets = Host::Http::listenOn(endpoints);
         const auto classes = compileClasses();
         const ProviderFiles files = source_.providerFiles();

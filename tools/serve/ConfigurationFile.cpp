@@ -7,6 +7,8 @@
 
 #include <CLI/CLI.hpp>
 
+#include <algorithm>
+#include <array>
 #include <cerrno>
 #include <fstream>
 #include <optional>
@@ -22,8 +24,7 @@ namespace {
 using Text::trimmed;
 
 // These options exist on the command line only.
-constexpr std::string_view nameOfFileOption = "config";
-constexpr std::string_view nameOfHelpOption = "help";
+constexpr std::array<std::string_view, 3> optionsOfCommandLine{"check", "config", "help"};
 
 class Reader {
 public:
@@ -52,7 +53,8 @@ public:
 private:
     CLI::Option& find(const std::string& name)
     {
-        CLI::Option* const option = name == nameOfFileOption || name == nameOfHelpOption
+        const auto* const end = optionsOfCommandLine.end();
+        CLI::Option* const option = std::find(optionsOfCommandLine.begin(), end, name) != end
                                         ? nullptr
                                         : parser_.get_option_no_throw("--" + name);
         if (option == nullptr)

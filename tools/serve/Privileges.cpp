@@ -38,6 +38,17 @@ std::optional<User> findUser(const std::string& name)
     return User{entry.pw_uid, entry.pw_gid};
 }
 
+// Returns the name of the user that the process runs as; the number where it has none.
+std::string ownName()
+{
+    ::passwd entry{};
+    ::passwd* found = nullptr;
+    std::vector<char> texts(1024);
+    while (::getpwuid_r(::geteuid(), &entry, texts.data(), texts.size(), &found) == ERANGE)
+        texts.resize(2 * texts.size());
+    return found != nullptr ? found->pw_name : "user " + std::to_string(::geteuid());
+}
+
 void require(bool isDone, const std::string& what)
 {
     if (!isDone)
@@ -68,7 +79,7 @@ std::string renounceRoot(const std::optional<std::string>& wanted)
         const auto user = wanted ? findUser(*wanted) : std::nullopt;
         if (wanted && (!user || user->id != ::geteuid()))
             throw std::runtime_error("only root can run the server as another user, " + *wanted);
-        return "serving as user " + std::to_string(::geteuid());
+        return "serving as " + ownName();
     }
     const std::string user = wanted                       ? *wanted
                              : findUser("sensor-profile") ? "sensor-profile"

@@ -17,6 +17,7 @@ namespace {
 using Host::Http::Certificate;
 using Host::Http::Passwords;
 using Host::Http::report;
+using Host::Http::Severity;
 
 std::shared_ptr<const Certificate> readCertificate(const ServeOptions& options)
 {
@@ -34,10 +35,10 @@ void attempt(const std::string& what, const std::function<void()>& renewal)
 {
     try {
         renewal();
-        report({"renew", "Protection", __LINE__}, "read " + what + " again");
+        report({"renew", "Protection", __LINE__}, "read " + what + " again", Severity::information);
     } catch (const std::exception& error) {
         report({"renew", "Protection", __LINE__},
-            std::string(error.what()) + "; what was read before stays in force");
+            std::string(error.what()) + "; what was read before stays in force", Severity::error);
     }
 }
 

@@ -24,6 +24,7 @@ struct ServeOptions {
     std::optional<std::string> passwords;
     std::optional<std::string> user;
     std::optional<std::string> configuration;
+    bool isCheck = false; // whether only the options and their files are checked
     Host::Http::Limits http;
     Host::OperationLimits operations;
     std::chrono::seconds gracePeriod{20};
