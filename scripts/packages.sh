@@ -37,23 +37,38 @@ missing_packages() {
   done
 }
 
-# Installs the missing packages of the list, with sudo when not root. All output goes to standard
-# error, so that it does not mix with the output of the caller.
+# Prints how much a command of apt-get downloads and how much room that takes, in parentheses.
+# Prints nothing where this machine has no lists of packages yet.
+size_of_packages() {
+  LC_ALL=C apt-get -o Debug::NoLocking=true install --assume-no --no-install-recommends "$@" \
+    2>/dev/null | awk '
+      /^Need to get / { download = $0; gsub(/Need to get |\/.*| of archives.*/, "", download) }
+      /^After this operation/ { print " (" download " to download, " $4 " " $5 " on the disk)" }'
+}
+
+# Installs the missing packages of the list, with sudo when not root. The output of apt-get is
+# printed only when it fails. Where the packages cannot be installed, the command for root is
+# printed. All output goes to standard error, so that it does not mix with that of the caller.
 install_packages() {
-  local missing as_root=()
+  local missing as_root=() log
   mapfile -t missing < <(missing_packages "$@")
   [ ${#missing[@]} -eq 0 ] && return 0
-  if [ "$(id -u)" -ne 0 ]; then
-    if ! command -v sudo >/dev/null; then
-      echo "These packages are missing, and neither root nor sudo is here to install them:" >&2
-      echo "  ${missing[*]}" >&2
-      return 1
+  if [ "$(id -u)" -eq 0 ] || { command -v sudo >/dev/null && as_root=(sudo); }; then
+    log=$(mktemp)
+    # A machine that has just started may hold the lock while it updates itself.
+    if "${as_root[@]}" apt-get update >"$log" 2>&1 &&
+      echo "Installing ${#missing[@]} packages$(size_of_packages "${missing[@]}"): ${missing[*]}" >&2 &&
+      "${as_root[@]}" env DEBIAN_FRONTEND=noninteractive apt-get -o DPkg::Lock::Timeout=300 \
+        install --yes --no-install-recommends "${missing[@]}" >"$log" 2>&1 </dev/null; then
+      rm "$log"
+      return 0
     fi
-    as_root=(sudo)
+    cat "$log" >&2
+    rm "$log"
   fi
-  echo "Installing ${missing[*]}" >&2
-  # A machine that has just started may hold the lock while it updates itself.
-  "${as_root[@]}" apt-get update --quiet=2 >&2 &&
-    "${as_root[@]}" env DEBIAN_FRONTEND=noninteractive \
-      apt-get -o DPkg::Lock::Timeout=300 install --yes --quiet=2 --no-install-recommends "${missing[@]}" >&2
+  cat >&2 <<END
+These packages are missing$(size_of_packages "${missing[@]}"). Root can install them:
+  apt-get update && apt-get install --no-install-recommends ${missing[*]}
+END
+  return 1
 }
