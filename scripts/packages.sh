@@ -18,7 +18,7 @@ check_packages=(
   libbenchmark-dev libgmock-dev libgtest-dev
   binutils lm-sensors locales python3-jsonschema util-linux
   openssl sblim-wbemcli
-  debootstrap dpkg-dev file iproute2 lintian man-db mandoc rpm rpmlint shellcheck systemd valgrind
+  debootstrap dpkg-dev file iproute2 jq lintian man-db mandoc rpm rpmlint shellcheck systemd valgrind
 )
 
 bench_packages=(

@@ -78,6 +78,32 @@ TEST(ManualOfTheToolTest, HasEveryCommandAndTheOptionsThereAre)
     EXPECT_EQ(options, std::set<std::string>());
 }
 
+// Returns the examples with output of a page, as blocks of a document for run-commands.
+std::string examplesOf(const std::string& page)
+{
+    static const std::regex block("\n\\.Bd -literal(\n\\$ [^]*?\n)\\.Ed");
+    std::string document;
+    for (std::sregex_iterator each(page.begin(), page.end(), block), end; each != end; ++each)
+        document += "```text" + (*each)[1].str() + "```\n";
+    for (const auto& [escape, text] : {std::pair("\\\\-", "-"), {"\\\\\\(de", "°"}, {"\\\\&", ""}})
+        document = std::regex_replace(document, std::regex(escape), text);
+    return document;
+}
+
+TEST(ManualOfTheToolTest, HasExamplesThatPrintWhatItShows)
+{
+    const std::string examples = examplesOf(contentOf(folder + "sensorctl.1"));
+    EXPECT_GE(countOf(examples, "```text\n$ sensorctl "), 4U);
+    const TemporaryFolder files;
+    const Ended ended = run({files.write("examples", examples)},
+        {.program = SENSOR_PROFILE_SOURCE_DIR "/tests/docs/run-commands",
+            .environment = {{"PATH", SENSOR_PROFILE_BINARY_DIR "/bin:/usr/bin:/bin"},
+                {"COLUMNS", "80"}, {"LC_ALL", "C.UTF-8"},
+                {"VORN_INSTRUMENTATION",
+                    "model:" SENSOR_PROFILE_SOURCE_DIR "/schema/demo-model.json"}}});
+    EXPECT_EQ(ended.code, 0) << ended.out << ended.err;
+}
+
 // The settings in the file are options, and the ports have their default values.
 TEST(SettingsOfTheServiceTest, AreOptionsOfTheServer)
 {
