@@ -16,6 +16,15 @@
 
 namespace Testing {
 
+// An administrator's configuration that concerns sensors of every captured machine.
+inline constexpr const char* sensorsConfiguration = "chip \"*-*\"\n"
+                                                    "  label temp1 \"First\"\n"
+                                                    "  label fan1 \"Front fan\"\n"
+                                                    "  compute temp1 @*2-1.5, (@+1.5)/2\n"
+                                                    "  compute in0 @*(1+10/3.3), @/(1+10/3.3)\n"
+                                                    "  ignore temp2\n"
+                                                    "  ignore fan2\n";
+
 // One channel in the output of `sensors -j`: subfeatures by the part of their name after "temp1_".
 struct SensorsChannel {
     std::string label;

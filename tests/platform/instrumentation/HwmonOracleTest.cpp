@@ -41,6 +41,7 @@ void expectSame(const SeenNode& node, const SensorsChannel& channel)
         EXPECT_NEAR(ours.value_or(0.0), isThere ? theirs->second : 0.0, printedDigits)
             << value.subfeature;
     }
+    EXPECT_FALSE(node.values.lowerFatal);
     EXPECT_EQ(node.values.status == 13, !channel.values.contains("input"));
 }
 
@@ -72,6 +73,13 @@ TEST_P(HwmonMachineTest, HasTheValuesOfTheSensorsProgram)
 {
     const BoundSysfs sysfs(GetParam().first);
     EXPECT_EQ(compareWithSensors(), GetParam().second);
+}
+
+TEST_P(HwmonMachineTest, HasTheValuesOfTheSensorsProgramWhereTheyAreComputed)
+{
+    const BoundSysfs sysfs(GetParam().first);
+    configuration().write(Testing::sensorsConfiguration);
+    EXPECT_GT(compareWithSensors(), 2U);
 }
 
 INSTANTIATE_TEST_SUITE_P(Machines, HwmonMachineTest,
