@@ -21,13 +21,12 @@
 #include "tests/support/CimCall.h"
 #include "tests/support/Environment.h"
 #include "tests/support/HttpClient.h"
+#include "tests/tools/ChildProcess.h"
 #include "tools/serve/FreedMemory.h"
 
 #include <fcntl.h>
 #include <sensors/sensors.h>
-#include <spawn.h>
 #include <sys/resource.h>
-#include <sys/wait.h>
 #include <unistd.h>
 
 #include <algorithm>
@@ -158,27 +157,27 @@ private:
 
 // ---- Other processes ----
 
-Cost program(std::vector<std::string> words)
+// Returns the processor time of the child processes that have ended.
+double childrenTime()
 {
-    std::vector<char*> arguments(words.size() + 1, nullptr);
-    std::transform(words.begin(), words.end(), arguments.begin(),
-        [](std::string& word) { return word.data(); });
-    ::posix_spawn_file_actions_t actions;
-    ::posix_spawn_file_actions_init(&actions);
-    ::posix_spawn_file_actions_addopen(&actions, STDOUT_FILENO, "/dev/null", O_WRONLY, 0);
-    ::pid_t child = -1;
-    const auto begin = Clock::now();
-    const int error =
-        ::posix_spawnp(&child, arguments.front(), &actions, nullptr, arguments.data(), environ);
-    ::posix_spawn_file_actions_destroy(&actions);
-    expect(error == 0, "a program that does not start");
     ::rusage usage{};
-    int status = 0;
-    expect(::wait4(child, &status, 0, &usage) == child && status == 0, "a program that fails");
+    ::getrusage(RUSAGE_CHILDREN, &usage);
     const auto of = [](const ::timeval& time) {
         return static_cast<double>(time.tv_sec) * 1e3 + static_cast<double>(time.tv_usec) / 1e3;
     };
-    return {of(usage.ru_utime) + of(usage.ru_stime), milliseconds(Clock::now() - begin)};
+    return of(usage.ru_utime) + of(usage.ru_stime);
+}
+
+Cost program(const std::string& file, const std::vector<std::string>& arguments)
+{
+    using Testing::RunOptions;
+    const double cpu = childrenTime();
+    const auto begin = Clock::now();
+    const Testing::Ended ended = Testing::run(
+        arguments, {.program = file, .out = RunOptions::Out::file, .outFile = "/dev/null"});
+    const double wall = milliseconds(Clock::now() - begin);
+    expect(ended.code == 0, "a program that fails");
+    return {childrenTime() - cpu, wall};
 }
 
 ::clockid_t clockOf(::pid_t process)
@@ -240,7 +239,6 @@ void compare(int wanted, std::size_t rounds)
     Testing::HttpClient client(server.port());
     const std::string request =
         Testing::cimRequest("EnumerateInstances", Testing::cimClassParameter(className));
-    const std::string sensorctl = SENSOR_PROFILE_BINARY_DIR "/bin/sensorctl";
 
     const auto enumInstanceNames = [&] {
         provider.request(sensors, [](auto* mi, auto& handling, auto* result, auto& path) {
@@ -274,16 +272,10 @@ void compare(int wanted, std::size_t rounds)
         {"GetInstance", "harvest", [&] { return costOf(getInstance); }},
         {"EnumerateInstances of the server", "EnumInstances",
             [&] { return costOf(overHttp, clockOf(server.id())); }},
-        {"sensors -j", "sensors -j",
-            [] {
-                return program({"sensors", "-j"});
-            }},
-        {"sensorctl list", "sensors -j",
-            [&] {
-                return program({sensorctl, "list"});
-            }},
-        {"sensorctl list --json", "sensors -j", [&] {
-             return program({sensorctl, "list", "--json"});
+        {"sensors -j", "sensors -j", [] { return program("/usr/bin/sensors", {"-j"}); }},
+        {"sensorctl list", "sensors -j", [] { return program(Testing::sensorctl, {"list"}); }},
+        {"sensorctl list --json", "sensors -j", [] {
+             return program(Testing::sensorctl, {"list", "--json"});
          }}};
     measure(rows, rounds);
     print(rows, sensors);
