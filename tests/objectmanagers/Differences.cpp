@@ -17,8 +17,8 @@ using Result = std::optional<Equivalent>;
 
 // ---- Both
 
-// Returns a request for each association of a sensor: `ours` by ZUMLO_SensorSystemDevice, which is the
-// first, and by ZUMLO_SensorElementCapabilities, and the other by that with the registered profile.
+// Returns a request for each association of a sensor: `ours` by ZUMLO_SensorSystemDevice, which is
+// the first, and by ZUMLO_SensorElementCapabilities, `conforming` by that with the profile.
 Equivalent byEachAssociation(ClientRequest ours, ClientRequest conforming)
 {
     ClientRequest one = ours;
