@@ -6,7 +6,7 @@
 
 build_packages=(
   g++ cmake ninja-build
-  libcli11-dev libexpat1-dev libfmt-dev libsensors-dev libspdlog-dev libutfcpp-dev
+  libcli11-dev libexpat1-dev libfmt-dev libncurses-dev libsensors-dev libspdlog-dev libutfcpp-dev
   nlohmann-json3-dev tao-pegtl-dev
   libcrypt-dev libgnutls28-dev libmicrohttpd-dev libsystemd-dev
   pkg-config
@@ -17,7 +17,7 @@ check_packages=(
   clang clang-format clang-tidy libclang-rt-14-dev
   libbenchmark-dev libgmock-dev libgtest-dev
   binutils lm-sensors locales python3-jsonschema util-linux
-  openssl sblim-wbemcli
+  openssl sblim-wbemcli tmux
   debootstrap dpkg-dev file iproute2 jq lintian man-db mandoc rpm rpmlint shellcheck systemd valgrind
 )
 

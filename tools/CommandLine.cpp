@@ -47,6 +47,7 @@ Commands addCommands(CLI::App& tool)
     commands.push_back(makeListCommand(tool));
     commands.push_back(makeGetCommand(tool));
     commands.push_back(makeWalkCommand(tool));
+    commands.push_back(makeWatchCommand(tool));
     commands.push_back(makeCheckCommand(tool));
     commands.push_back(makeRecordCommand(tool));
     commands.push_back(makeServeCommand(tool));

@@ -15,7 +15,7 @@
 namespace {
 
 using Tools::Sensor;
-using Tools::Severity;
+using Tools::Urgency;
 
 class SensorTest : public Testing::InstanceTest {
 protected:
@@ -35,7 +35,7 @@ TEST_F(SensorTest, InstanceWithoutPropertiesSaysNothing)
     EXPECT_EQ(reading(), std::nullopt);
     EXPECT_EQ(seen().unit, "");
     EXPECT_EQ(seen().state.word, "Unknown");
-    EXPECT_EQ(seen().state.severity, Severity::unknown);
+    EXPECT_EQ(seen().state.urgency, Urgency::unknown);
     EXPECT_FALSE(seen().limits.back());
 }
 
@@ -135,13 +135,13 @@ TEST_F(SensorTest, KindFollowsTheSensorType)
 TEST_F(SensorTest, StateIsThatOfTheProvider)
 {
     setCodes("OperationalStatus", {13});
-    for (const auto& [state, word, severity] : {std::tuple("Normal", "Normal", Severity::normal),
-             {"WarningLow", "Warning low", Severity::warning},
-             {"CriticalHigh", "Critical high", Severity::critical},
-             {"Disabled", "Disabled", Severity::inactive}, {"New", "Unknown", Severity::unknown}}) {
+    for (const auto& [state, word, urgency] : {std::tuple("Normal", "Normal", Urgency::normal),
+             {"WarningLow", "Warning low", Urgency::warning},
+             {"CriticalHigh", "Critical high", Urgency::critical},
+             {"Disabled", "Disabled", Urgency::inactive}, {"New", "Unknown", Urgency::unknown}}) {
         setText("CurrentState", state);
         EXPECT_EQ(seen().state.word, word);
-        EXPECT_EQ(seen().state.severity, severity);
+        EXPECT_EQ(seen().state.urgency, urgency);
     }
 }
 
@@ -149,13 +149,13 @@ TEST_F(SensorTest, UnknownStateGivesWayToTheOperationalStatus)
 {
     setText("CurrentState", "Unknown");
     EXPECT_EQ(seen().state.word, "Unknown");
-    for (const auto& [status, word, severity] : {std::tuple(5U, "Failing soon", Severity::warning),
-             {8U, "Starting", Severity::inactive}, {12U, "No contact", Severity::lost},
-             {13U, "Lost", Severity::lost}, {15U, "Dormant", Severity::inactive},
-             {0U, "Unknown", Severity::unknown}, {2U, "Unknown", Severity::unknown}}) {
+    for (const auto& [status, word, urgency] : {std::tuple(5U, "Failing soon", Urgency::warning),
+             {8U, "Starting", Urgency::inactive}, {12U, "No contact", Urgency::lost},
+             {13U, "Lost", Urgency::lost}, {15U, "Dormant", Urgency::inactive},
+             {0U, "Unknown", Urgency::unknown}, {2U, "Unknown", Urgency::unknown}}) {
         setCodes("OperationalStatus", {status});
         EXPECT_EQ(seen().state.word, word);
-        EXPECT_EQ(seen().state.severity, severity);
+        EXPECT_EQ(seen().state.urgency, urgency);
     }
 }
 

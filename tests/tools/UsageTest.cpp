@@ -23,7 +23,7 @@ TEST(UsageTest, HelpGoesToStandardOutput)
 
 TEST(UsageTest, EveryCommandHasItsHelp)
 {
-    for (const char* const command : {"list", "get", "walk", "check", "record", "serve"}) {
+    for (const char* const command : {"list", "get", "walk", "watch", "check", "record", "serve"}) {
         const Ended ended = run({command, "--help"});
         EXPECT_EQ(ended.code, 0);
         EXPECT_THAT(ended.out, HasSubstr(std::string("sensorctl ") + command));
@@ -32,9 +32,9 @@ TEST(UsageTest, EveryCommandHasItsHelp)
 
 TEST(UsageTest, HelpFitsIntoEightyColumns)
 {
-    for (const std::vector<std::string>& arguments :
-        std::vector<std::vector<std::string>>{{"--help"}, {"list", "--help"}, {"get", "--help"},
-            {"walk", "--help"}, {"check", "--help"}, {"record", "--help"}, {"serve", "--help"}})
+    for (const std::vector<std::string>& arguments : std::vector<std::vector<std::string>>{
+             {"--help"}, {"list", "--help"}, {"get", "--help"}, {"walk", "--help"},
+             {"watch", "--help"}, {"check", "--help"}, {"record", "--help"}, {"serve", "--help"}})
         for (const std::string& line : linesOf(run(arguments).out))
             EXPECT_LE(line.size(), 80U) << line;
 }
@@ -50,9 +50,9 @@ TEST(UsageTest, WrongUsageIsSaidAndEndsWithTwo)
 {
     for (const std::vector<std::string>& arguments :
         std::vector<std::vector<std::string>>{{}, {"frobnicate"}, {"list", "--kind", "humidity"},
-            {"list", "--csv", "--json"}, {"list", "--cim", "--flat"}, {"list", "--frobnicate"},
-            {"list", "--model"}, {"list", "--color", "blue"}, {"get"}, {"walk", "one", "two"},
-            {"walk", "--json"}, {"record", "extra"}}) {
+            {"watch", "--interval", "0"}, {"list", "--csv", "--json"}, {"list", "--cim", "--flat"},
+            {"list", "--frobnicate"}, {"list", "--model"}, {"list", "--color", "blue"}, {"get"},
+            {"walk", "one", "two"}, {"walk", "--json"}, {"record", "extra"}}) {
         const Ended ended = run(arguments);
         EXPECT_EQ(ended.code, 2) << testing::PrintToString(arguments);
         EXPECT_EQ(ended.out, "");

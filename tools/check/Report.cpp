@@ -53,11 +53,11 @@ Verdict verdictOn(const Sensor& sensor, const Range* warning, const Range* criti
     if (isBeyond(critical))
         return {CheckStatus::critical, critical};
     const bool hasReading = sensor.reading.has_value();
-    if (sensor.state.severity == Severity::critical && (critical == nullptr || !hasReading))
+    if (sensor.state.urgency == Urgency::critical && (critical == nullptr || !hasReading))
         return {CheckStatus::critical};
     if (isBeyond(warning))
         return {CheckStatus::warning, warning};
-    if (isProblem(sensor.state.severity) && (warning == nullptr || !hasReading))
+    if (isProblem(sensor.state.urgency) && (warning == nullptr || !hasReading))
         return {CheckStatus::warning};
     return {};
 }

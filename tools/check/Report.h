@@ -16,7 +16,7 @@ namespace Tools {
 // The exit codes of monitoring plugins.
 enum class CheckStatus { ok = 0, warning = 1, critical = 2, unknown = 3 };
 
-// A range that replaces the sensors' own state of one severity.
+// A range that replaces the limits of the sensors that the selector matches.
 struct Override {
     std::string selector;
     Range range;

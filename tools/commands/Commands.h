@@ -13,6 +13,7 @@ namespace Tools {
 std::unique_ptr<Command> makeListCommand(CLI::App& tool);
 std::unique_ptr<Command> makeGetCommand(CLI::App& tool);
 std::unique_ptr<Command> makeWalkCommand(CLI::App& tool);
+std::unique_ptr<Command> makeWatchCommand(CLI::App& tool);
 std::unique_ptr<Command> makeCheckCommand(CLI::App& tool);
 std::unique_ptr<Command> makeRecordCommand(CLI::App& tool);
 std::unique_ptr<Command> makeServeCommand(CLI::App& tool);

@@ -49,7 +49,7 @@ SelectionOptions::Selected SelectionOptions::select(const Sensors& all) const
     const bool isOfSomeKind = !selected.sensors.empty();
     if (onlyProblems_)
         std::erase_if(selected.sensors,
-            [](const Sensor& sensor) { return !isProblem(sensor.state.severity); });
+            [](const Sensor& sensor) { return !isProblem(sensor.state.urgency); });
     if (selected.sensors.empty() && selected.complaints.empty())
         selected.complaints.emplace_back(
             isOfSomeKind ? "none of the sensors has a problem" : "no sensor is of that kind");

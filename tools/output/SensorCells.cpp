@@ -7,18 +7,18 @@
 
 namespace Tools {
 
-Emphasis emphasisOf(Severity severity)
+Emphasis emphasisOf(Urgency urgency)
 {
-    switch (severity) {
-    case Severity::normal:
+    switch (urgency) {
+    case Urgency::normal:
         return Emphasis::good;
-    case Severity::warning:
-    case Severity::lost:
+    case Urgency::warning:
+    case Urgency::lost:
         return Emphasis::warning;
-    case Severity::critical:
+    case Urgency::critical:
         return Emphasis::critical;
-    case Severity::inactive:
-    case Severity::unknown:
+    case Urgency::inactive:
+    case Urgency::unknown:
         break;
     }
     return Emphasis::none;
@@ -26,7 +26,7 @@ Emphasis emphasisOf(Severity severity)
 
 Cell stateCell(const Sensor& sensor)
 {
-    return {std::string(sensor.state.word), emphasisOf(sensor.state.severity)};
+    return {std::string(sensor.state.word), emphasisOf(sensor.state.urgency)};
 }
 
 Cell readingCell(const Sensor& sensor)

@@ -11,7 +11,7 @@
 
 namespace Tools {
 
-Emphasis emphasisOf(Severity severity);
+Emphasis emphasisOf(Urgency urgency);
 Cell stateCell(const Sensor& sensor);
 Cell readingCell(const Sensor& sensor);
 Cell unitCell(const Sensor& sensor, const TextStyle& style); // empty without a reading

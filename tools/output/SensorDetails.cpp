@@ -43,7 +43,7 @@ std::string sensorDetails(const Sensor& sensor, const TextStyle& style)
 {
     Details details(style);
     details.add("Reading", textWithUnit(sensor.reading, sensor));
-    details.add("State", std::string(sensor.state.word), emphasisOf(sensor.state.severity));
+    details.add("State", std::string(sensor.state.word), emphasisOf(sensor.state.urgency));
     for (std::size_t i = 0; i < limitKinds.size(); ++i)
         if (const auto& limit = sensor.limits.at(i))
             details.add(limitKinds.at(i).words, textWithUnit(limit, sensor));

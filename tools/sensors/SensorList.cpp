@@ -19,13 +19,8 @@ void sort(Sensors& sensors)
     std::vector<Sensor*> order;
     for (Sensor& sensor : sensors)
         order.push_back(&sensor);
-    std::sort(order.begin(), order.end(), [](const Sensor* first, const Sensor* second) {
-        for (const auto& [left, right] : {std::pair(&first->chip, &second->chip),
-                 {&first->label, &second->label}, {&first->path, &second->path}})
-            if (const auto comparison = compareNaturally(*left, *right); comparison != 0)
-                return comparison < 0;
-        return first->deviceId < second->deviceId;
-    });
+    std::sort(order.begin(), order.end(),
+        [](const Sensor* first, const Sensor* second) { return isListedBefore(*first, *second); });
     Sensors sorted;
     sorted.reserve(order.size());
     for (Sensor* const sensor : order)
@@ -44,6 +39,15 @@ std::vector<const char*> propertiesOfSensors()
 }
 
 } // namespace
+
+bool isListedBefore(const Sensor& first, const Sensor& second)
+{
+    for (const auto& [left, right] : {std::pair(&first.chip, &second.chip),
+             {&first.label, &second.label}, {&first.path, &second.path}})
+        if (const auto comparison = compareNaturally(*left, *right); comparison != 0)
+            return comparison < 0;
+    return first.deviceId < second.deviceId;
+}
 
 Sensors readSensors(ProviderClient& provider, bool isWhole)
 {
@@ -76,19 +80,19 @@ Sensors sensorsInFile(const std::string& file)
 
 std::string summaryOf(const Sensors& sensors)
 {
-    std::map<Severity, std::size_t> counts;
+    std::map<Urgency, std::size_t> counts;
     for (const Sensor& sensor : sensors)
-        ++counts[sensor.state.severity];
+        ++counts[sensor.state.urgency];
     std::string text =
         std::to_string(sensors.size()) + (sensors.size() == 1 ? " sensor" : " sensors");
     const char* separator = ": ";
-    for (const Severity severity : {Severity::normal, Severity::warning, Severity::critical,
-             Severity::lost, Severity::inactive, Severity::unknown}) {
-        const auto count = counts.find(severity);
+    for (const Urgency urgency : {Urgency::normal, Urgency::warning, Urgency::critical,
+             Urgency::lost, Urgency::inactive, Urgency::unknown}) {
+        const auto count = counts.find(urgency);
         if (count == counts.end())
             continue;
         text.append(separator).append(std::to_string(count->second)).append(" ");
-        text.append(wordOf(severity));
+        text.append(wordOf(urgency));
         separator = ", ";
     }
     return text + ".";

@@ -16,6 +16,9 @@ class ProviderClient;
 // In natural order by chip, label and path.
 using Sensors = std::vector<Sensor>;
 
+// Returns whether a sensor comes before another one in a list.
+bool isListedBefore(const Sensor& first, const Sensor& second);
+
 // Returns all sensors, with only those properties that a Sensor has unless `isWhole`. Their
 // instances belong to the client's request. Throws as ProviderClient does.
 Sensors readSensors(ProviderClient& provider, bool isWhole);

@@ -19,22 +19,22 @@ struct StateRow {
     SensorState state;
 };
 constexpr std::array stateRows = {
-    StateRow{"Normal", none, {"Normal", Severity::normal}},
-    StateRow{"WarningLow", none, {"Warning low", Severity::warning}},
-    StateRow{"WarningHigh", none, {"Warning high", Severity::warning}},
-    StateRow{"Warning", none, {"Warning", Severity::warning}},
-    StateRow{"CriticalLow", none, {"Critical low", Severity::critical}},
-    StateRow{"CriticalHigh", none, {"Critical high", Severity::critical}},
-    StateRow{"Critical", none, {"Critical", Severity::critical}},
-    StateRow{"Disabled", none, {"Disabled", Severity::inactive}},
-    StateRow{"Offline", none, {"Offline", Severity::inactive}},
-    StateRow{"", 5, {"Failing soon", Severity::warning}},
-    StateRow{"", 8, {"Starting", Severity::inactive}},
-    StateRow{"", 9, {"Stopping", Severity::inactive}},
-    StateRow{"", 10, {"Stopped", Severity::inactive}},
-    StateRow{"", 12, {"No contact", Severity::lost}},
-    StateRow{"", 13, {"Lost", Severity::lost}},
-    StateRow{"", 15, {"Dormant", Severity::inactive}},
+    StateRow{"Normal", none, {"Normal", Urgency::normal}},
+    StateRow{"WarningLow", none, {"Warning low", Urgency::warning}},
+    StateRow{"WarningHigh", none, {"Warning high", Urgency::warning}},
+    StateRow{"Warning", none, {"Warning", Urgency::warning}},
+    StateRow{"CriticalLow", none, {"Critical low", Urgency::critical}},
+    StateRow{"CriticalHigh", none, {"Critical high", Urgency::critical}},
+    StateRow{"Critical", none, {"Critical", Urgency::critical}},
+    StateRow{"Disabled", none, {"Disabled", Urgency::inactive}},
+    StateRow{"Offline", none, {"Offline", Urgency::inactive}},
+    StateRow{"", 5, {"Failing soon", Urgency::warning}},
+    StateRow{"", 8, {"Starting", Urgency::inactive}},
+    StateRow{"", 9, {"Stopping", Urgency::inactive}},
+    StateRow{"", 10, {"Stopped", Urgency::inactive}},
+    StateRow{"", 12, {"No contact", Urgency::lost}},
+    StateRow{"", 13, {"Lost", Urgency::lost}},
+    StateRow{"", 15, {"Dormant", Urgency::inactive}},
 };
 
 } // namespace
@@ -51,16 +51,16 @@ SensorState stateOf(std::string_view currentState, std::span<const unsigned> sta
     return row == stateRows.end() ? SensorState{} : row->state;
 }
 
-bool isProblem(Severity severity)
+bool isProblem(Urgency urgency)
 {
-    return severity >= Severity::lost;
+    return urgency >= Urgency::lost;
 }
 
-std::string_view wordOf(Severity severity)
+std::string_view wordOf(Urgency urgency)
 {
     constexpr std::array<std::string_view, 6> words = {
         "normal", "inactive", "unknown", "lost", "warning", "critical"};
-    return words.at(static_cast<std::size_t>(severity));
+    return words.at(static_cast<std::size_t>(urgency));
 }
 
 } // namespace Tools

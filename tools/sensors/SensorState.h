@@ -10,11 +10,11 @@
 namespace Tools {
 
 // In ascending order of urgency.
-enum class Severity { normal, inactive, unknown, lost, warning, critical };
+enum class Urgency { normal, inactive, unknown, lost, warning, critical };
 
 struct SensorState {
     std::string_view word = "Unknown"; // such as "Warning high"
-    Severity severity = Severity::unknown;
+    Urgency urgency = Urgency::unknown;
 };
 
 // Returns the state with that CurrentState; where this is empty or "Unknown", the one with a code
@@ -22,9 +22,9 @@ struct SensorState {
 SensorState stateOf(std::string_view currentState, std::span<const unsigned> statuses);
 
 // Returns whether a person should look at the sensor.
-bool isProblem(Severity severity);
+bool isProblem(Urgency urgency);
 
-// Returns the word for sensors of that severity in a summary, such as "warning".
-std::string_view wordOf(Severity severity);
+// Returns the word for sensors of that urgency in a summary, such as "warning".
+std::string_view wordOf(Urgency urgency);
 
 } // namespace Tools

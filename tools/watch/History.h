@@ -1,0 +1,51 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// What happened to sensors while they were watched.
+
+#pragma once
+
+#include "tools/sensors/SensorList.h"
+
+#include <ctime>
+#include <deque>
+#include <map>
+#include <optional>
+#include <string>
+#include <vector>
+
+namespace Tools {
+
+// A sensor with its latest readings. One that is gone has no reading and the state "Missing".
+struct WatchedSensor {
+    static constexpr std::size_t keptReadings = 120;
+
+    Sensor sensor;
+    std::optional<Quantity> minimum; // since the first update; nothing before the first reading
+    std::optional<Quantity> maximum;
+    std::deque<std::optional<double>> readings; // the latest last
+};
+
+// A sensor that changed its state, came or went.
+struct Change {
+    std::time_t time;
+    std::string text; // such as "chip/label: Normal -> Warning high (91 °C)"
+    Urgency urgency;
+};
+
+class History {
+public:
+    // Takes the present sensors. Returns what has changed since the last update; nothing in the
+    // first one.
+    std::vector<Change> update(const Sensors& present, std::time_t now);
+
+    // Returns the sensors in natural order by chip, label and path.
+    std::vector<const WatchedSensor*> sensors() const;
+
+private:
+    static void take(WatchedSensor& watched, const Sensor& present);
+
+    std::map<std::string, WatchedSensor> watched_; // by DeviceID
+    bool isFirst_ = true;
+};
+
+} // namespace Tools
