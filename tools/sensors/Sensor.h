@@ -52,7 +52,7 @@ inline constexpr std::size_t firstUpperLimit = 3;
 struct Sensor {
     Sensor() = default;
     // Interprets an instance of ZUMLO_NumericSensor.
-    explicit Sensor(const Host::Instance& instance);
+    explicit Sensor(const Host::Instance& from);
 
     // Sets the identifier by what it consists of: label and path.
     void setNames(std::string_view itsLabel, std::string_view itsPath);
