@@ -1,7 +1,7 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Calls of the broker that test the objects they use. Objects belong to the broker. A `CMPIStatus*` is passed on to the broker and may be
-// null.
+// Calls of the broker that test the objects they use. Objects belong to the broker. A `CMPIStatus*`
+// is passed on to the broker and may be null.
 
 #pragma once
 

@@ -36,8 +36,8 @@ public:
     // failure, with a text for the user.
     virtual ExitCode run(Output& out) = 0;
 
-    // Reports why the command line is invalid or run() failed. Returns the exit code of the process:
-    // the given one unless the command has other conventions.
+    // Reports why the command line is invalid or run() failed. Returns the exit code of the
+    // process: the given one unless the command has other conventions.
     virtual ExitCode reportFailure(Output& out, const std::string& reason, ExitCode code) const;
 
     // Returns whether the libraries' log is a result of the command. It is collected otherwise.

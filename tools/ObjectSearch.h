@@ -26,9 +26,9 @@ public:
     // The provider must outlive the object.
     explicit ObjectSearch(ProviderClient& provider) : provider_(provider) {}
 
-    // Finds an object by object path, by DeviceID, by a selector that only one sensor matches, or by
-    // InstanceID, in this order. Throws UsageError for a malformed path, and std::runtime_error when
-    // a provider fails.
+    // Finds an object by object path, by DeviceID, by a selector that only one sensor matches, or
+    // by InstanceID, in this order. Throws UsageError for a malformed path, and std::runtime_error
+    // when a provider fails.
     ObjectFound find(const std::string& wanted);
 
 private:

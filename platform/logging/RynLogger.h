@@ -26,7 +26,8 @@ enum class Severity { error = 3, warning = 4, information = 6, debug = 7 };
 // below. The identity under which the process writes to syslog is left as the process set it.
 //
 // Where standard error is the systemd journal, the line begins with its severity (sd-daemon(3)) and
-// has no time; messages of the log channel are the text alone, unless lower levels are written, too.
+// has no time; messages of the log channel are the text alone, unless lower levels are written,
+// too.
 //
 // Every function may be called from any thread and never throws: a line that cannot be
 // written is lost. A null text is written as (null).

@@ -34,4 +34,14 @@ inline std::vector<std::string> exportedNames(const std::string& library)
     return names;
 }
 
+// Returns the names that the library takes from others, with their versions.
+inline std::vector<std::string> importedNames(const std::string& library)
+{
+    std::istringstream lines(outputOf("nm -D --undefined-only '" + library + "'"));
+    std::vector<std::string> names;
+    for (std::string type, name; lines >> type >> name;)
+        names.push_back(name.substr(0, name.find('@')));
+    return names;
+}
+
 } // namespace Testing

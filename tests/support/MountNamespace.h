@@ -14,8 +14,8 @@
 
 namespace Testing {
 
-// Executes the program again by `private_mounts` or `unshare`; returns when it runs in the namespace already or none
-// can be created. REQUIRES: called first in main(), with main's argument.
+// Executes the program again by `private_mounts` or `unshare`; returns when it runs in the
+// namespace already or none can be created. REQUIRES: called first in main(), with main's argument.
 void enterMountNamespace(char** argv);
 
 // Skips its tests with the reason where no namespace can be created; fails them in CI.

@@ -207,7 +207,9 @@ TEST_F(ConfigurationMistakesTest, AreToldOnceInTheWordsOfSensors)
     EXPECT_NE(expected.find("Error: File /etc/sensors3.conf, line 2: "), std::string::npos)
         << expected;
     for (const char* const command : {"list", "walk", "record"}) {
-        const Ended ended = run({command}, {.environment = {{"RYNLOG_LOG", ""}}});
+        // The parser of libsensors does not free the words of a line with an error.
+        const Ended ended = run(
+            {command}, {.environment = {{"RYNLOG_LOG", ""}, {"ASAN_OPTIONS", "detect_leaks=0"}}});
         EXPECT_EQ(ended.code, 0);
         EXPECT_EQ(ended.err, expected) << command;
     }

@@ -71,8 +71,8 @@ std::string descriptionOf(const sensors_chip_name& chip, const sensors_feature& 
     return text.empty() ? feature.name : text;
 }
 
-std::vector<Attribute> attributesOf(
-    int folder, const sensors_chip_name& chip, const sensors_feature& feature, bool mayBeComputed)
+std::vector<Attribute> attributesOf(const sensors_chip_name& chip, const sensors_feature& feature,
+    bool mayBeComputed, const std::vector<std::string>& enables)
 {
     std::vector<Attribute> attributes;
     int position = 0;
@@ -87,15 +87,16 @@ std::vector<Attribute> attributesOf(
                 mayBeComputed && (found->flags & SENSORS_COMPUTE_MAPPING) != 0});
     }
     std::string enable = std::string(feature.name) + "_enable";
-    if (faccessat(folder, enable.c_str(), F_OK, 0) == 0)
+    if (std::find(enables.begin(), enables.end(), enable) != enables.end())
         attributes.push_back({std::move(enable), &enableMeaning, false});
     return attributes;
 }
 
 // Returns the features of a chip without their place in the catalogue.
-std::vector<Feature> featuresOf(const NamedChip& chip, int folder, const ComputeLines& computeLines)
+std::vector<Feature> featuresOf(const NamedChip& chip, const ComputeLines& computeLines)
 {
     const auto& [chipName, name] = chip;
+    const std::vector<std::string> enables = enableAttributes(name->path);
     std::vector<Feature> features;
     int position = 0;
     while (const sensors_feature* found = sensors_get_features(name, &position))
@@ -103,7 +104,7 @@ std::vector<Feature> featuresOf(const NamedChip& chip, int folder, const Compute
             Node node{"/hwmon/" + chipName + "/" + found->name, descriptionOf(*name, *found),
                 static_cast<unsigned>(*type)};
             features.push_back({found->name, *type, std::move(node), 0,
-                attributesOf(folder, *name, *found, computeLines.mayApplyTo(*name, found->name))});
+                attributesOf(*name, *found, computeLines.mayApplyTo(*name, found->name), enables)});
         }
     return features;
 }
@@ -129,12 +130,11 @@ Catalogue makeCatalogue(const ComputeLines& computeLines)
             continue;
         Chip chip{path, *id, Descriptor()};
         chip.folder = chip.openFolder();
-        std::vector<Feature> features = featuresOf(detected, chip.folder.number(), computeLines);
+        std::vector<Feature> features = featuresOf(detected, computeLines);
         // A chip that disappeared while its features were listed is left out, since the labels,
         // which name the sensors, may be incomplete.
         if (features.empty() || id != folderId(path))
             continue;
-        // They may be incomplete, too, when the process has no descriptors left.
         if (!chip.folder.isOpen())
             throw std::runtime_error("cannot open " + path);
         for (Feature& feature : features) {

@@ -34,9 +34,13 @@ std::optional<double> readNumber(int folder, const std::string& name)
         return std::nullopt;
     std::string_view text(block.data(), static_cast<std::size_t>(count));
     text.remove_prefix(std::min(text.find_first_not_of(Text::asciiBlanks), text.size()));
+    if (text.starts_with('+'))
+        text.remove_prefix(1);
     double number = 0.0;
-    const auto result = std::from_chars(text.data(), text.data() + text.size(), number);
-    return result.ec == std::errc() ? std::optional(number) : std::nullopt;
+    const char* const end = text.data() + text.size();
+    const auto result = std::from_chars(text.data(), end, number);
+    const bool isHexadecimal = result.ptr != end && (*result.ptr == 'x' || *result.ptr == 'X');
+    return result.ec == std::errc() && !isHexadecimal ? std::optional(number) : std::nullopt;
 }
 
 // Returns nothing when the attribute cannot be read, and when its value, after a `compute` line, is

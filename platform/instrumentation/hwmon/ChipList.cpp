@@ -7,12 +7,17 @@
 #include <sensors/error.h>
 #include <sensors/sensors.h>
 
+#include <fcntl.h>
+
 #include <algorithm>
+#include <array>
+#include <cerrno>
 #include <cstdio>
 #include <memory>
 #include <mutex>
 #include <new>
 #include <stdexcept>
+#include <system_error>
 #include <utility>
 
 namespace Vorn::Hwmon {
@@ -20,6 +25,19 @@ namespace Vorn::Hwmon {
 namespace {
 
 constexpr auto attributesPeriod = std::chrono::seconds(2);
+
+// Throws std::system_error when the process lacks the descriptors with which chips are listed:
+// libsensors takes a file that it cannot open for one that is not there, so that its list would
+// have no chips, or labels would be missing.
+void requireDescriptors()
+{
+    std::array<Descriptor, 3> spare; // the class's folder, a chip's and a file
+    for (Descriptor& each : spare) {
+        each = Descriptor(::open("/", O_PATH | O_CLOEXEC));
+        if (!each.isOpen())
+            throw std::system_error(errno, std::generic_category(), "the chips cannot be listed");
+    }
+}
 
 } // namespace
 
@@ -31,7 +49,6 @@ ChipList& ChipList::instance()
 
 ChipList::~ChipList()
 {
-    const std::unique_lock alone(mutex_);
     sensors_cleanup();
 }
 
@@ -110,6 +127,7 @@ void ChipList::renew()
         try {
             Catalogue catalogue =
                 machine.hasHwmon ? makeCatalogue(initialise(SensorsConfiguration())) : Catalogue();
+            requireDescriptors();
             catalogue.machine = std::move(machine);
             catalogue.attributes = attributes;
             catalogue_ = std::make_shared<const Catalogue>(std::move(catalogue));

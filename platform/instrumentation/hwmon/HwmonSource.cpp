@@ -37,8 +37,8 @@ NodeReading HwmonSource::read(const Node& node)
     return reading ? std::move(*reading) : reader_->read(feature);
 }
 
-// Reads the nodes of the type, chip by chip. A further thread starts when the last one has not
-// ended after an interval: where all chips are fast, more threads would only cost time.
+// Reads the nodes of the type, chip by chip. A further thread starts only when no chip was finished
+// in an interval: where all chips are fast, more threads would only cost time.
 void HwmonSource::readAhead(NodeType type)
 {
     constexpr std::size_t maximumThreads = 16;
@@ -57,10 +57,15 @@ void HwmonSource::readAhead(NodeType type)
     };
     // Where no thread can be started, get() reads the chips.
     std::vector<std::future<void>> threads;
-    do
-        threads.push_back(std::async(readChips));
-    while (threads.size() < maximumThreads &&
-           threads.back().wait_for(interval) == std::future_status::timeout);
+    bool isStuck = true;
+    while (next < catalogue_->chips.size() && threads.size() < maximumThreads) {
+        const std::size_t before = next;
+        if (isStuck)
+            threads.push_back(std::async(readChips));
+        if (threads.back().wait_for(interval) != std::future_status::timeout)
+            break;
+        isStuck = next <= before + 1; // a thread that started takes one chip at once
+    }
     for (auto& thread : threads)
         thread.get();
 }

@@ -8,11 +8,17 @@
 #include <cstdio>
 #include <new>
 
-// The private copy of libsensors has these names for the standard streams.
+// The private copy of libsensors has these names for the standard streams and for exit(), which its
+// lexer calls, past the hook for fatal errors, when memory is exhausted.
 extern "C" {
 FILE* sensorsStdin = stdin;
 FILE* sensorsStdout = stdout;
 FILE* sensorsStderr = stderr;
+
+[[noreturn]] void sensorsExit(int)
+{
+    throw std::bad_alloc();
+}
 }
 
 namespace Vorn::Hwmon {

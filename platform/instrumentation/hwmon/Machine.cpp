@@ -8,9 +8,11 @@
 #include <fcntl.h>
 #include <sys/stat.h>
 
+#include <cerrno>
 #include <functional>
 #include <memory>
 #include <string_view>
+#include <system_error>
 
 namespace Vorn::Hwmon {
 
@@ -19,13 +21,17 @@ namespace {
 constexpr const char* hwmonFolder = "/sys/class/hwmon";
 
 // Calls the visitor with a descriptor of the folder and the name of each entry that is not hidden.
-// Returns whether there is such a folder.
+// Returns whether there is such a folder. Throws std::system_error when it cannot be opened for
+// another reason, such as a lack of descriptors.
 template <typename Visitor>
 bool visitEntries(const std::string& path, const Visitor& visit)
 {
     const std::unique_ptr<DIR, int (*)(DIR*)> folder(opendir(path.c_str()), &closedir);
-    if (folder == nullptr)
-        return false;
+    if (folder == nullptr) {
+        if (errno == ENOENT || errno == ENOTDIR)
+            return false;
+        throw std::system_error(errno, std::generic_category(), path);
+    }
     while (const dirent* const entry = readdir(folder.get()))
         if (entry->d_name[0] != '.')
             visit(dirfd(folder.get()), entry->d_name);
@@ -61,6 +67,16 @@ Machine presentMachine()
             machine.files.emplace_back(file.native(), stampOf(status));
     }
     return machine;
+}
+
+std::vector<std::string> enableAttributes(const std::string& chipFolder)
+{
+    std::vector<std::string> names;
+    visitEntries(chipFolder, [&](int, std::string_view name) {
+        if (name.ends_with("_enable"))
+            names.emplace_back(name);
+    });
+    return names;
 }
 
 std::size_t attributesFingerprint(const Machine& machine)

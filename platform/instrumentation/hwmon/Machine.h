@@ -33,8 +33,12 @@ struct Machine {
     bool operator==(const Machine&) const = default;
 };
 
-// Costs a few system calls, and one for each chip.
+// Costs a few system calls, and one for each chip. Throws std::system_error when the folder of the
+// chips cannot be listed.
 Machine presentMachine();
+
+// Returns the names that end in "_enable" in the folder of a chip: libsensors does not list them.
+std::vector<std::string> enableAttributes(const std::string& chipFolder);
 
 // Returns a number that changes with the names of the attributes of the chips: drivers may add and
 // remove attributes of a registered chip. Lists the folder of each chip.

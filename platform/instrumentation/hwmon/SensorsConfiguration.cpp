@@ -28,7 +28,8 @@ bool isHidden(const fs::path& path)
     return path.filename().native().starts_with('.');
 }
 
-// The regular files of the folder that are not hidden, sorted by name.
+// Returns the regular files of the folder that are not hidden, sorted by name. Throws
+// std::system_error when the process has too many open files to list them.
 std::vector<fs::path> visibleFiles(const fs::path& folder)
 {
     std::vector<fs::path> files;
@@ -39,6 +40,9 @@ std::vector<fs::path> visibleFiles(const fs::path& folder)
         if (!isHidden(entry->path()) && entry->is_regular_file(gone))
             files.push_back(entry->path());
     }
+    if (error == std::errc::too_many_files_open ||
+        error == std::errc::too_many_files_open_in_system)
+        throw std::system_error(error, folder.native());
     std::sort(files.begin(), files.end());
     return files;
 }

@@ -158,8 +158,11 @@ std::optional<double> expectedReading(const Testing::SeenNode& node)
     return readings.at(node.path);
 }
 
-TEST_F(HwmonChangeTest, EightThreadsReadWhileChipsComeAndGo)
+class HwmonChangeByOrderTest : public HwmonTest, public testing::WithParamInterface<const char*> {};
+
+TEST_P(HwmonChangeByOrderTest, EightThreadsReadWhileChipsComeAndGo)
 {
+    const Testing::EnvironmentVariable source("VORN_INSTRUMENTATION", GetParam());
     configuration().write("chip \"drivetemp-*\"\n  compute temp1 @*2, @/2\n");
     BoundSysfs sysfs("hotplug");
     std::atomic<bool> goOn{true};
@@ -187,5 +190,8 @@ TEST_F(HwmonChangeTest, EightThreadsReadWhileChipsComeAndGo)
     EXPECT_GT(walks, 8U);
     EXPECT_THAT(walk(), SizeIs(3));
 }
+
+INSTANTIATE_TEST_SUITE_P(Orders, HwmonChangeByOrderTest, testing::Values("hwmon", "hwmon:parallel"),
+    [](const auto& order) { return order.param == std::string("hwmon") ? "Serial" : "Parallel"; });
 
 } // namespace HwmonChangeTests

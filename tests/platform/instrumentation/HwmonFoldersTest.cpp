@@ -2,12 +2,19 @@
 
 // The descriptors of the chips' folders.
 
+#include "platform/instrumentation/Descriptor.h"
 #include "platform/instrumentation/hwmon/HwmonSource.h"
 #include "tests/platform/instrumentation/HwmonMachine.h"
 
+#include <fcntl.h>
 #include <gtest/gtest.h>
+#include <sys/resource.h>
 
 #include <iterator>
+#include <stdexcept>
+#include <string>
+#include <utility>
+#include <vector>
 
 namespace HwmonFoldersTests {
 
@@ -65,6 +72,62 @@ TEST_F(HwmonFoldersTest, PastTheBoundFoldersAreOpenWhileTheyAreRead)
         EXPECT_LE(openDescriptors(), before + 257);
     }
     EXPECT_EQ(sum, chips * (chips - 1) + 0.5 * chips);
+}
+
+// Leaves the process as many unused descriptors during its lifetime.
+class FewDescriptors {
+public:
+    explicit FewDescriptors(int unused)
+    {
+        ::getrlimit(RLIMIT_NOFILE, &before_);
+        const ::rlimit low = {64, before_.rlim_max};
+        ::setrlimit(RLIMIT_NOFILE, &low);
+        for (;;) {
+            Vorn::Descriptor used(::open("/", O_PATH | O_CLOEXEC));
+            if (!used.isOpen())
+                break;
+            used_.push_back(std::move(used));
+        }
+        for (; unused > 0; --unused)
+            used_.pop_back();
+    }
+    ~FewDescriptors() { ::setrlimit(RLIMIT_NOFILE, &before_); }
+    FewDescriptors(const FewDescriptors&) = delete;
+    FewDescriptors& operator=(const FewDescriptors&) = delete;
+
+private:
+    ::rlimit before_{};
+    std::vector<Vorn::Descriptor> used_;
+};
+
+std::vector<std::string> descriptions()
+{
+    std::vector<std::string> found;
+    for (const Testing::SeenNode& node : Testing::walk())
+        found.push_back(node.description);
+    return found;
+}
+
+TEST_F(HwmonFoldersTest, WithoutDescriptorsARequestFailsAndTheNextIsRight)
+{
+    BoundSysfs sysfs("");
+    std::vector<std::string> expected;
+    unsigned failures = 0;
+    for (int unused = 0; unused < 8; ++unused) {
+        const std::string name = "hwmon" + std::to_string(unused);
+        sysfs.addChip(name, "board", "platform", "board." + std::to_string(unused));
+        sysfs.write("hwmon/" + name + "/temp1_input", "20000\n");
+        sysfs.write("hwmon/" + name + "/temp1_label", "Zone " + std::to_string(unused) + "\n");
+        expected.push_back("Zone " + std::to_string(unused));
+        try {
+            const FewDescriptors few(unused);
+            EXPECT_EQ(descriptions(), expected) << unused;
+        } catch (const std::runtime_error&) {
+            ++failures;
+        }
+        EXPECT_EQ(descriptions(), expected) << unused;
+    }
+    EXPECT_GT(failures, 0U);
 }
 
 TEST_F(HwmonFoldersTest, PastTheBoundAChipThatTookAnothersPlaceIsNotReadForIt)

@@ -181,6 +181,9 @@ const Shape shapes[] = {
     {"dividesByZero", "chip \"board-*\"\n  compute temp1 1/(@-@), @\n", {"board-isa-0290/temp1"}},
     {"takesTheLogarithmOfANegative", "chip \"board-*\"\n  compute temp1 `(0-@), @\n",
         {"board-isa-0290/temp1"}},
+    {"computesOnALabel", "chip \"board-*\"\n  label in0 \"Core\"\n  compute Core @*2, @/2\n", {}},
+    {"refersToALabel", "chip \"board-*\"\n  label in0 \"Core\"\n  compute in1 Core+@, @\n",
+        {"board-isa-0290/in1"}},
     {"hasTwoSectionsForAChip",
         "chip \"board-*\"\n  compute in0 @*2, @/2\n  label in0 \"First\"\n"
         "chip \"*-isa-*\"\n  compute in0 @*5, @/5\n  compute in1 @*7, @/7\n  label in0 "

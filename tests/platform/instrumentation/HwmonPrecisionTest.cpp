@@ -53,7 +53,7 @@ TEST(KeepingMillivoltsTest, OtherVoltagesStayAsTheyAre)
         EXPECT_EQ(keepingMillivolts(volts), volts);
 }
 
-// Each channel of a bound tree is read through libsensors.
+// Each channel of a bound tree is read as the source reads it.
 TEST_F(HwmonPrecisionTest, ReadingsAndLimitsOfVoltagesKeepTheirMillivolts)
 {
     for (const int number : {408, 1000, 1100, 1200, 1208, 3232, 3300, 3376, 4350, 12096, -1200}) {

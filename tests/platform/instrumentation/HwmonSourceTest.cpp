@@ -90,9 +90,7 @@ TEST_F(HwmonTest, TheAverageStandsInWhereThereIsNoInput)
         nodeOf({{"in1_average", "3250"}, {"in1_input", "none"}}).values.reading, std::nullopt);
 }
 
-// libsensors opens the attribute at each reading. Its error is "Kernel interface error" where the
-// file cannot be opened, and "Can't read" where it contains no number or cannot be read. These are
-// the failures that need no driver.
+// The attribute is a folder, has no number, or is gone: the failures that need no driver.
 TEST_F(HwmonTest, AnAttributeThatCannotBeReadNowIsLostNow)
 {
     OneChip chip(Attributes{{"temp1_input", "50000"}});
@@ -205,7 +203,8 @@ TEST_F(HwmonTest, AConfigurationMayBeWrongFromTheFirstLineOnThoughItIsReadAgain)
         chip.sysfs().addChip("hwmon" + other, other, "platform", other + ".1");
     }
     ASSERT_THAT(capture.log(), SizeIs(1));
-    EXPECT_EQ(capture.log()[0].text, "Error: File /etc/sensors3.conf, line 2: Parse error in chip name");
+    EXPECT_EQ(
+        capture.log()[0].text, "Error: File /etc/sensors3.conf, line 2: Parse error in chip name");
 }
 
 TEST_F(HwmonTest, TheFolderOfConfigurationsAddsToTheFile)
@@ -218,7 +217,8 @@ TEST_F(HwmonTest, TheFolderOfConfigurationsAddsToTheFile)
     const Testing::BindMount bound(folder.path(), "/etc/sensors.d");
     EXPECT_EQ(nodeOf({{"temp1_input", "20000"}}).description, "First");
     ASSERT_THAT(capture.log(), SizeIs(1));
-    EXPECT_THAT(capture.log()[0].text, HasSubstr("Error: File /etc/sensors.d/20-wrong.conf, line 3: "));
+    EXPECT_THAT(
+        capture.log()[0].text, HasSubstr("Error: File /etc/sensors.d/20-wrong.conf, line 3: "));
 }
 
 TEST_F(HwmonTest, AConfigurationThatCannotBeReadIsNamed)
