@@ -23,7 +23,13 @@ _sensorctl_takes() {
 _sensorctl_sensors() {
   local tool=$1 model=() i
   for ((i = 1; i < ${#COMP_WORDS[@]} - 1; i++)); do
-    [ "${COMP_WORDS[i]}" != --model ] || model=(--model "${COMP_WORDS[i + 1]}")
+    case ${COMP_WORDS[i]} in
+      --model=*) model=("${COMP_WORDS[i]}") ;;
+      --model) # interactive shells split words at the sign, too
+        [ "${COMP_WORDS[i + 1]}" != = ] || i=$((i + 1))
+        model=(--model "${COMP_WORDS[i + 1]}")
+        ;;
+    esac
   done
   "$tool" list --json "${model[@]}" 2>/dev/null |
     sed -n 's/.*"chip": "\([^"\\]*\)".*"label": "\([^"\\]*\)".*/\1\n\2/p' | sort --unique
@@ -51,8 +57,12 @@ _sensorctl() {
     mapfile -t COMPREPLY < <(compgen -u -- "$word")
   elif ! _sensorctl_takes "$tool" "$command" "$previous" '[A-Z]+' &&
     "$tool" "$command" --help 2>/dev/null | grep --quiet --extended-regexp -e '^  (SELECTOR|OBJECT) '; then
-    local IFS=$'\n'
-    mapfile -t COMPREPLY < <(compgen -W "$(_sensorctl_sensors "$tool")" -- "$word")
+    # Names are data, which `compgen -W` would expand. They are selected in any letter case.
+    local name begun=${word#[\"\']}
+    begun=${begun//\\/}
+    while IFS= read -r name; do
+      [[ ${name,,} != "${begun,,}"* ]] || COMPREPLY+=("$name")
+    done < <(_sensorctl_sensors "$tool")
   fi
 }
 

@@ -3,6 +3,7 @@
 // The completions of bash for command lines of sensorctl.
 
 #include "tests/packaging/Installation.h"
+#include "tests/support/TemporaryFolder.h"
 #include "tests/tools/ToolTest.h"
 
 #include <gmock/gmock.h>
@@ -63,6 +64,24 @@ TEST(CompletionTest, OffersChipsAndLabels)
     EXPECT_THAT(offersFor({"get", "--model", model, "--json", "system/n"}),
         ElementsAre("system/nic1", "system/nvme1", "system/nvme2"));
     EXPECT_THAT(offersFor({"list", "--kind", "v"}), ElementsAre("voltage"));
+}
+
+TEST(CompletionTest, OffersChipsAndLabelsInAnyLetterCase)
+{
+    const std::string model = installedFile("share/sensor-profile/demo-model.json");
+    EXPECT_THAT(
+        offersFor({"list", "--model=" + model, "nvme"}), ElementsAre("NVMe 1 Temp", "NVMe 2 Temp"));
+    EXPECT_THAT(offersFor({"list", "--model", "=", model, "nvme 2"}), ElementsAre("NVMe 2 Temp"));
+}
+
+TEST(CompletionTest, OffersLabelsWithoutExpandingThem)
+{
+    TemporaryFolder folder;
+    folder.write("model.json", R"({"nodes": [
+        {"type": "temperature", "path": "/a/1", "description": "Fan 'A"},
+        {"type": "temperature", "path": "/a/2", "description": "Fan $(kill $$) `kill $$` *"}]})");
+    EXPECT_THAT(offersFor({"list", "--model", folder.path() / "model.json", "fan"}),
+        ElementsAre("Fan $(kill $$) `kill $$` *", "Fan 'A"));
 }
 
 TEST(CompletionTest, OffersNoFilesForOtherThings)
