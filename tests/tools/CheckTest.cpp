@@ -40,15 +40,15 @@ TEST_F(CheckTest, WorstSensorDecidesAndComesFirst)
     EXPECT_EQ(ended.out,
         "SENSORS CRITICAL - cpu1/CPU 2: Critical high (97 C), board/+12V: Warning high (12.75 V), "
         "board/fan2: Lost - 5 sensors: 2 normal, 1 warning, 1 critical, 1 lost. | "
-        "'board/+12V'=12.75V;12.5;10.5: 'board/Fan'=1200;300:; 'cpu0/CPU 1'=41C;5:80;95 "
-        "'cpu1/CPU 2'=97C;;95\n");
+        "'board/+12V'=12.75V;~:12.5;10.5: 'board/Fan'=1200;300:; 'cpu0/CPU 1'=41C;5:80;~:95 "
+        "'cpu1/CPU 2'=97C;;~:95\n");
 }
 
 TEST_F(CheckTest, ExitCodeFollowsTheStates)
 {
     EXPECT_EQ(checked({"cpu0"}).code, 0);
     EXPECT_EQ(
-        checked({"cpu0"}).out, "SENSORS OK - 1 sensor: 1 normal. | 'cpu0/CPU 1'=41C;5:80;95\n");
+        checked({"cpu0"}).out, "SENSORS OK - 1 sensor: 1 normal. | 'cpu0/CPU 1'=41C;5:80;~:95\n");
     EXPECT_EQ(checked({"fan2"}).code, 1);
     EXPECT_EQ(checked({"fan2"}).out, "SENSORS WARNING - board/Fan: Lost - 1 sensor: 1 lost.\n");
     EXPECT_EQ(checked({"--kind", "voltage"}).code, 1);
@@ -73,7 +73,7 @@ TEST_F(CheckTest, RangesReplaceTheSensorsOwnLimits)
 {
     EXPECT_EQ(checked({"cpu0", "--warning", "CPU*=40"}).out,
         "SENSORS WARNING - cpu0/CPU 1: 41 C is beyond 40 - 1 sensor: 1 normal. | "
-        "'cpu0/CPU 1'=41C;40;95\n");
+        "'cpu0/CPU 1'=41C;40;~:95\n");
     EXPECT_EQ(checked({"cpu0", "--critical", "CPU*=50:"}).code, 2);
     EXPECT_EQ(checked({"cpu0", "--warning", "CPU*=40", "--warning", "cpu 1=41"}).code, 0);
     EXPECT_EQ(checked({"in1", "--warning", "+12V=12.75"}).code, 0);
@@ -81,6 +81,11 @@ TEST_F(CheckTest, RangesReplaceTheSensorsOwnLimits)
     EXPECT_EQ(checked({"cpu1", "--critical", "cpu1=100"}).code, 1); // still above its own limits
     EXPECT_EQ(checked({"cpu1", "--critical", "cpu1=100", "--warning", "cpu1=100"}).code, 0);
     EXPECT_EQ(checked({"fan2", "--warning", "fan=100:", "--critical", "fan=50:"}).code, 1);
+}
+
+TEST_F(CheckTest, HelpSaysWhatSilencesASensor)
+{
+    EXPECT_THAT(run({"check", "--help"}).out, HasSubstr("silence a sensor, give both options"));
 }
 
 TEST_F(CheckTest, WhatIsMissingFromTheExpectedMachineIsCritical)
@@ -107,13 +112,17 @@ TEST_F(CheckTest, WhatIsMissingFromTheExpectedMachineIsCritical)
 
 TEST_F(CheckTest, ManyProblemsAreCounted)
 {
-    std::string nodes;
-    for (int i = 1; i <= 12; ++i)
-        nodes += std::string(i == 1 ? "" : ",") +
-                 R"({ "type": "voltage", "status": 13, "path": "/)" + std::to_string(i) +
-                 R"(", "description": "V)" + std::to_string(i) + R"(" })";
-    EXPECT_THAT(
-        checkedFile(model(nodes)).out, HasSubstr("//V8: Lost, 4 more problems - 12 sensors"));
+    const auto checkedWith = [&](int sensors) {
+        std::string nodes;
+        for (int i = 1; i <= sensors; ++i)
+            nodes += std::string(i == 1 ? "" : ",") +
+                     R"({ "type": "voltage", "status": 13, "path": "/)" + std::to_string(i) +
+                     R"(", "description": "V)" + std::to_string(i) + R"(" })";
+        return checkedFile(model(nodes)).out;
+    };
+    EXPECT_THAT(checkedWith(12), HasSubstr("//V8: Lost, 4 more problems - 12 sensors"));
+    EXPECT_THAT(checkedWith(9), HasSubstr("//V8: Lost, 1 more problem - 9 sensors"));
+    EXPECT_THAT(checkedWith(8), HasSubstr("//V8: Lost - 8 sensors"));
 }
 
 TEST_F(CheckTest, WhatCannotBeJudgedIsUnknown)

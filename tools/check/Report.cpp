@@ -23,11 +23,12 @@ const Range* findRange(const std::vector<Override>& overrides, const Sensor& sen
     return found == overrides.rend() ? nullptr : &found->range;
 }
 
-// Returns the limits as a range; an empty text when there are none.
+// Returns the limits as a range; an empty text when there are none. A range without a beginning
+// would begin at zero.
 std::string rangeText(const std::optional<Quantity>& low, const std::optional<Quantity>& high)
 {
     if (!low)
-        return high ? high->text() : "";
+        return high ? "~:" + high->text() : "";
     return low->text() + ":" + (high ? high->text() : "");
 }
 
@@ -131,8 +132,10 @@ std::string Report::toText(const std::string& summary, bool isUtf8) const
     std::string text;
     for (std::size_t i = 0; i < std::min(problems.size(), shownProblems); ++i)
         text += (text.empty() ? "" : ", ") + problems[i].text;
-    if (problems.size() > shownProblems)
-        text += ", " + std::to_string(problems.size() - shownProblems) + " more problems";
+    if (problems.size() > shownProblems) {
+        const std::size_t more = problems.size() - shownProblems;
+        text += ", " + std::to_string(more) + (more == 1 ? " more problem" : " more problems");
+    }
     if (!summary.empty())
         text += (text.empty() ? "" : " - ") + summary;
     text = withoutReserved(text);

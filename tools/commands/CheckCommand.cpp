@@ -24,7 +24,8 @@ constexpr const char* checkFooter =
     "Prints one line with performance data as monitoring plugins do, and exits with\n"
     "0 OK, 1 WARNING, 2 CRITICAL, 3 UNKNOWN. A lost sensor is a WARNING, one that is\n"
     "missing from FILE's machine CRITICAL. RANGE is that of plugins: 80, 10:80, 10:,\n"
-    "~:80 or @10:80. A reading beyond it decides instead of the sensor's own limits.";
+    "~:80 or @10:80. It replaces a sensor's own limits of that kind only: to\n"
+    "silence a sensor, give both options.";
 
 std::vector<Override> overridesIn(const std::vector<std::string>& texts)
 {
