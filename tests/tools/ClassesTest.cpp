@@ -49,6 +49,20 @@ TEST_F(ClassesTest, SensorsAreTheDefault)
     EXPECT_EQ(listed("ZUMLO_NumericSensor").out, run({"list", "--model", smallModel()}).out);
 }
 
+TEST_F(ClassesTest, KindAndProblemsNarrowTheClassOfSensors)
+{
+    const auto expectSame = [&](const std::vector<std::string>& options) {
+        std::vector<std::string> arguments = {"list", "--model", smallModel()};
+        arguments.insert(arguments.end(), options.begin(), options.end());
+        const Ended named = listed("ZUMLO_NumericSensor", options);
+        EXPECT_EQ(named.code, 0);
+        EXPECT_EQ(named.out, run(arguments).out);
+        EXPECT_NE(named.out, listed("ZUMLO_NumericSensor").out);
+    };
+    expectSame({"--kind", "fan"});
+    expectSame({"--problems"});
+}
+
 TEST_F(ClassesTest, TableShowsWhatTellsObjectsApartAndTheirStates)
 {
     EXPECT_EQ(linesOf(listed("ZUMLO_ComputerSystem").out).front().substr(0, 4), "NAME");
@@ -89,11 +103,15 @@ TEST_F(ClassesTest, UnknownClassIsASelectorThatNothingMatches)
     EXPECT_EQ(ended.err, "sensorctl: no sensor matches \"ZUMLO_Unheard\"\n");
 }
 
-TEST_F(ClassesTest, CsvIsForSensors)
+TEST_F(ClassesTest, SomeOptionsAreForSensors)
 {
-    const Ended ended = listed("ZUMLO_ComputerSystem", {"--csv"});
-    EXPECT_EQ(ended.code, 2);
-    EXPECT_THAT(ended.err, HasSubstr("--csv is for sensors"));
+    for (const std::vector<std::string>& options : std::vector<std::vector<std::string>>{
+             {"--csv"}, {"--flat"}, {"--problems"}, {"--kind", "fan"}}) {
+        const Ended ended = listed("ZUMLO_ComputerSystem", options);
+        EXPECT_EQ(ended.code, 2);
+        EXPECT_EQ(ended.out, "");
+        EXPECT_THAT(ended.err, HasSubstr(options.front() + " is for sensors"));
+    }
 }
 
 TEST_F(ClassesTest, DocumentsHaveOneShape)

@@ -61,6 +61,13 @@ TEST(UsageTest, WrongUsageIsSaidAndEndsWithTwo)
     }
 }
 
+TEST(UsageTest, SecondFormOfOutputIsWrong)
+{
+    for (const char* const command : {"list", "get"})
+        EXPECT_THAT(run({command, "a", "--json", "--cim"}).err,
+            StartsWith("sensorctl: only one form of output can be given"));
+}
+
 TEST(UsageTest, WhatWasTypedIsNotObeyedByTheTerminal)
 {
     EXPECT_THAT(run({"\x1B[31m"}).err, HasSubstr("\\x1B[31m"));

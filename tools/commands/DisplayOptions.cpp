@@ -15,7 +15,7 @@ void DisplayOptions::addForm(
 {
     const auto choose = [this, form] {
         if (form_ != Form::table && form_ != form)
-            throw CLI::ValidationError("only one of --flat, --csv, --json and --cim can be given");
+            throw CLI::ValidationError("only one form of output can be given");
         form_ = form;
     };
     parser.add_flag_callback(option, choose, description);

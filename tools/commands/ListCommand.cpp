@@ -76,7 +76,7 @@ private:
         const Sensors all = readSensors(provider, display_.form() == Form::cim);
         if (all.empty())
             return std::nullopt;
-        const auto selected = named ? SelectionOptions().select(all) : selection_.select(all);
+        const auto selected = (named ? selection_.withoutSelectors() : selection_).select(all);
         write(out, selected.sensors);
         out.flush();
         for (const std::string& complaint : selected.complaints)
@@ -87,8 +87,10 @@ private:
     std::optional<ExitCode> showObjects(
         Output& out, const std::string& className, const Instances& objects) const
     {
-        if (display_.form() == Form::csv)
-            throw UsageError("--csv is for sensors, not for objects of the class " + className);
+        for (const char* const option : {"--kind", "--problems", "--flat", "--csv"})
+            if (parser().count(option) != 0)
+                throw UsageError(std::string(option) +
+                                 " is for sensors, not for objects of the class " + className);
         if (display_.form() == Form::json || display_.form() == Form::cim)
             writeJson(out, className, objects);
         else if (!objects.empty())
@@ -133,7 +135,7 @@ private:
     void writeSummary(
         Output& out, std::string text, const std::string& others, const TextStyle& style) const
     {
-        if (!others.empty() && !selection_.isGiven())
+        if (!others.empty())
             text += (text.size() + others.size() + 2 <= style.width ? "  " : "\n") + others;
         out.write(text + "\n");
     }

@@ -29,6 +29,13 @@ void SelectionOptions::addProblems(CLI::App& parser)
     parser.add_flag("--problems", onlyProblems_, "Only sensors that warn, are critical or lost");
 }
 
+SelectionOptions SelectionOptions::withoutSelectors() const
+{
+    SelectionOptions others = *this;
+    others.selectors_.clear();
+    return others;
+}
+
 bool SelectionOptions::isSelected(const Sensor& sensor) const
 {
     const auto isKind = [&](const std::string& kind) { return kind == sensor.kind; };

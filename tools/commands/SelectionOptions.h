@@ -25,6 +25,8 @@ public:
 
     const std::vector<std::string>& selectors() const { return selectors_; }
     bool isGiven() const { return !selectors_.empty() || !kinds_.empty() || onlyProblems_; }
+    // Returns what the other options select.
+    SelectionOptions withoutSelectors() const;
 
     struct Selected {
         Sensors sensors;
