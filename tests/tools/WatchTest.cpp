@@ -108,6 +108,18 @@ TEST_F(WatchTest, KeysFilterSortScrollAndQuit)
     EXPECT_THAT(terminal.waitFor("ended with"), StartsWith("ended with 0\n"));
 }
 
+TEST_F(WatchTest, BeginsWithTheProblemsOfTheKindOnRequest)
+{
+    change(node(85, 23) + fan());
+    const Tmux problems(command("C.UTF-8", "--problems"), 80, 24);
+    EXPECT_THAT(problems.waitFor("q quit"),
+        AllOf(HasSubstr("by chip, problems only\n"), HasSubstr("CPU 1"), Not(HasSubstr("Lüfter"))));
+    problems.press("p");
+    problems.waitFor("Lüfter");
+    const Tmux fans(command("C.UTF-8", "--kind fan"), 80, 24);
+    EXPECT_THAT(fans.waitFor("q quit"), AllOf(HasSubstr("Lüfter"), Not(HasSubstr("CPU 1"))));
+}
+
 TEST_F(WatchTest, SurvivesResizing)
 {
     change(node(41, 1) + fan());
@@ -139,7 +151,7 @@ TEST_F(WatchTest, WithoutUtf8ItIsAscii)
 {
     change(node(41, 1) + fan());
     const Tmux terminal(command("C"), 80, 24);
-    const std::string seen = terminal.waitFor("CPU 1");
+    const std::string seen = terminal.waitFor("41 C ");
     EXPECT_THAT(seen, AllOf(HasSubstr("L\\u00FCfter"), HasSubstr("41 C ")));
     EXPECT_TRUE(std::all_of(seen.begin(), seen.end(), [](char c) { return c > 0; })) << seen;
 }

@@ -60,6 +60,8 @@ public:
         : Command(tool, "watch", "Show the sensors and their changes until a key ends it")
     {
         selection_.addTo(parser());
+        parser().add_flag(
+            "--problems", onlyProblems_, "Begin with the problems only, as after the key p");
         parser()
             .add_option("--interval", interval_, "Seconds between two readings (default: 2)")
             ->type_name("SECONDS")
@@ -125,6 +127,8 @@ private:
         Screen screen(display_.style().isColored);
         History history;
         WatchView view;
+        if (onlyProblems_)
+            view.toggleProblems();
         Clock::time_point next = Clock::now();
         for (Key key = Key::none; key != Key::quit;) {
             if (Clock::now() >= next) {
@@ -183,6 +187,7 @@ private:
     }
 
     SelectionOptions selection_;
+    bool onlyProblems_ = false;
     double interval_ = 2;
     bool isMachineEmpty_ = false;
     DisplayOptions display_;
