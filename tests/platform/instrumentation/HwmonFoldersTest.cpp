@@ -111,9 +111,11 @@ std::vector<std::string> descriptions()
 TEST_F(HwmonFoldersTest, WithoutDescriptorsARequestFailsAndTheNextIsRight)
 {
     BoundSysfs sysfs("");
+    Testing::walk(); // closes the folders of the machine of another test
     std::vector<std::string> expected;
     unsigned failures = 0;
-    for (int unused = 0; unused < 8; ++unused) {
+    // The undefined-behaviour sanitizer takes two to look at the type of an exception.
+    for (int unused = 2; unused < 10; ++unused) {
         const std::string name = "hwmon" + std::to_string(unused);
         sysfs.addChip(name, "board", "platform", "board." + std::to_string(unused));
         sysfs.write("hwmon/" + name + "/temp1_input", "20000\n");
