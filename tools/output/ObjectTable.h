@@ -17,7 +17,6 @@ namespace Tools {
 
 // Returns a table with the identifying keys (of associations, the short names of their ends),
 // names and states that any of the objects has; also the class where there are several.
-std::string objectTable(
-    const std::vector<const Host::Instance*>& objects, const TextStyle& style);
+std::string objectTable(const std::vector<const Host::Instance*>& objects, const TextStyle& style);
 
 } // namespace Tools
