@@ -103,7 +103,7 @@ private:
     {
         provider.beginRequest();
         Sensors sensors = selection_.select(readSensors(provider, false)).sensors;
-        if (source_.readsHwmon())
+        if (SourceOptions::readsHwmon())
             nameDevices(sensors);
         return sensors;
     }

@@ -62,9 +62,9 @@ struct Sensor {
     std::string chip;    // the folder of the path, without "/hwmon/"
     std::string feature; // the rest of the path
     std::string deviceId;
-    std::string device;         // what the chip belongs to, such as a disk's model; often empty
-    std::string_view kind = ""; // one of sensorKinds, or empty
-    std::string_view unit;      // empty when unknown
+    std::string device;    // what the chip belongs to, such as a disk's model; often empty
+    std::string_view kind; // one of sensorKinds, or empty
+    std::string_view unit; // empty when unknown
 
     // Nothing when the sensor has none: when CurrentReading is missing or out of range, when
     // communication is lost (OperationalStatus 13), and when CurrentReading is 0 and the sensor is

@@ -4,6 +4,7 @@
 
 #include <algorithm>
 #include <array>
+#include <cmath>
 
 namespace Tools {
 
@@ -25,7 +26,7 @@ std::string sparkline(
     for (auto each = begin; each != readings.end(); ++each) {
         const double range = least ? *greatest - *least : 0;
         const double share = *each && range > 0 ? (**each - *least) / range : 0;
-        const auto level = static_cast<std::size_t>(share * (blocks.size() - 1) + 0.5);
+        const auto level = static_cast<std::size_t>(std::lround(share * (blocks.size() - 1)));
         text += !*each ? " " : isUtf8 ? blocks.at(level) : characters.at(level);
     }
     return text;
