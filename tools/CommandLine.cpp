@@ -76,14 +76,14 @@ ExitCode refuse(
 }
 
 // Writes the messages to standard error, but for those that contain a text that is written anyway.
-void tell(const std::vector<std::string>& messages, const std::string& known)
+void printMessages(const std::vector<std::string>& messages, const std::string& known)
 {
     for (const std::string& message : messages)
         if (known.empty() || message.find(known) == std::string::npos)
             writeAll(STDERR_FILENO, message + "\n");
 }
 
-// Runs a command, and tells what its libraries logged.
+// Runs a command and prints what its libraries logged.
 ExitCode runCommand(Command& command, Output& out)
 {
     if (command.writesLog())
@@ -92,14 +92,14 @@ ExitCode runCommand(Command& command, Output& out)
     try {
         const ExitCode code = command.run(out);
         out.flush();
-        tell(log.messages(), "");
+        printMessages(log.messages(), "");
         for (const std::string& message : refusedSensors())
             complain(message);
         return code;
     } catch (const UsageError&) {
         throw;
     } catch (const std::exception& error) {
-        tell(log.messages(), error.what());
+        printMessages(log.messages(), error.what());
         throw;
     }
 }

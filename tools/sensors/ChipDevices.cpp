@@ -70,12 +70,10 @@ std::optional<std::string> addressIn(const std::string& device)
         return count == 4 && static_cast<std::size_t>(end) == device.size();
     };
     const char* const text = device.c_str();
-    // NOLINTBEGIN(cert-err34-c): the kernel's names have no numbers that overflow
     if (isWhole(std::sscanf(text, "%u:%u:%u:%x%n", &first, &second, &third, &fourth, &end)))
         return formatted("-scsi-%u-%x", first, (second << 8U) + (third << 4U) + fourth);
     if (isWhole(std::sscanf(text, "%x:%2x:%2x.%1x%n", &first, &second, &third, &fourth, &end)))
         return formatted("-pci-%04x", (first << 16U) + (second << 8U) + (third << 3U) + fourth);
-    // NOLINTEND(cert-err34-c)
     return std::nullopt;
 }
 
