@@ -158,6 +158,9 @@ protected:
         }
         for (std::thread& client : clients)
             client.join();
+        // The last request may have listed the machine without the chip, whose folder is not open
+        // then.
+        askAll(HttpClient(server_->port()), allSensors, 3, 3);
     }
 
     std::size_t residentKilobytes() const
