@@ -73,11 +73,12 @@ private:
             className = *named;
             return showObjects(out, className, provider.instances(className));
         }
-        const Sensors all = readSensors(provider, display_.form() == Form::cim);
+        Sensors all = readSensors(provider, display_.form() == Form::cim);
         if (all.empty())
             return std::nullopt;
-        const auto selected = (named ? selection_.withoutSelectors() : selection_).select(all);
-        write(out, selected.sensors);
+        auto selected =
+            (named ? selection_.withoutSelectors() : selection_).select(std::move(all));
+        write(out, std::move(selected.sensors));
         out.flush();
         for (const std::string& complaint : selected.complaints)
             complain(complaint);

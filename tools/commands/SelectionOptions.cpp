@@ -44,15 +44,15 @@ bool SelectionOptions::isSelected(const Sensor& sensor) const
            (selectors_.empty() || std::any_of(selectors_.begin(), selectors_.end(), isMatch));
 }
 
-SelectionOptions::Selected SelectionOptions::select(const Sensors& all) const
+SelectionOptions::Selected SelectionOptions::select(Sensors all) const
 {
     Selected selected;
     for (const std::string& selector : selectors_)
         if (std::none_of(all.begin(), all.end(),
                 [&](const Sensor& sensor) { return selects(selector, sensor); }))
             selected.complaints.push_back(nothingMatches(selector, all));
-    std::copy_if(all.begin(), all.end(), std::back_inserter(selected.sensors),
-        [&](const Sensor& sensor) { return isSelected(sensor); });
+    std::erase_if(all, [&](const Sensor& sensor) { return !isSelected(sensor); });
+    selected.sensors = std::move(all);
     const bool isOfSomeKind = !selected.sensors.empty();
     if (onlyProblems_)
         std::erase_if(selected.sensors,

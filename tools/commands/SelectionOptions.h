@@ -32,7 +32,7 @@ public:
         Sensors sensors;
         std::vector<std::string> complaints; // a sentence for each criterion that nothing meets
     };
-    Selected select(const Sensors& all) const;
+    Selected select(Sensors all) const;
 
     // Returns whether the selectors and the kind select the sensor, whatever its state.
     bool isSelected(const Sensor& sensor) const;

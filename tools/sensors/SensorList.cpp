@@ -44,8 +44,9 @@ bool isListedBefore(const Sensor& first, const Sensor& second)
 {
     for (const auto& [left, right] : {std::pair(&first.chip, &second.chip),
              {&first.label, &second.label}, {&first.path, &second.path}})
-        if (const auto comparison = compareNaturally(*left, *right); comparison != 0)
-            return comparison < 0;
+        if (*left != *right) // most comparisons are of one chip's sensors
+            if (const auto comparison = compareNaturally(*left, *right); comparison != 0)
+                return comparison < 0;
     return first.deviceId < second.deviceId;
 }
 
