@@ -8,8 +8,24 @@
 
 namespace Host {
 
+namespace {
+
+// Returns one of 64 bits, the same for a name in any letter case.
+std::uint64_t markOf(std::string_view name) noexcept
+{
+    if (name.empty())
+        return 1;
+    const auto first = static_cast<unsigned char>(foldCase(name.front()));
+    const auto last = static_cast<unsigned char>(foldCase(name.back()));
+    return std::uint64_t{1} << ((name.size() * 5 + first * 3U + last) % 64);
+}
+
+} // namespace
+
 const NamedValue* NamedValues::find(std::string_view name) const noexcept
 {
+    if ((marks_ & markOf(name)) == 0)
+        return nullptr;
     for (const NamedValue& element : elements_)
         if (equalNames(*element.name->text(), name))
             return &element;
@@ -24,12 +40,14 @@ void NamedValues::set(Arena& arena, std::string_view name, const Value& value)
         const_cast<NamedValue*>(known)->value = value; // an element of *this, which is not const
     else
         elements_.append(arena, {&arena.name(name), value});
+    marks_ |= markOf(name);
 }
 
 NamedValues NamedValues::shared() const
 {
     NamedValues copy;
     copy.elements_ = elements_;
+    copy.marks_ = marks_;
     copy.isShared_ = isShared_ = true;
     return copy;
 }

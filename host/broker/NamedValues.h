@@ -11,6 +11,7 @@
 #include <cmpidt.h>
 
 #include <cstddef>
+#include <cstdint>
 #include <string_view>
 
 namespace Host {
@@ -61,6 +62,7 @@ public:
 
 private:
     ArenaList<NamedValue> elements_;
+    std::uint64_t marks_ = 0; // of all names: most that are set are new, and need no search
     mutable bool isShared_ = false;
 };
 

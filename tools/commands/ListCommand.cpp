@@ -76,8 +76,7 @@ private:
         Sensors all = readSensors(provider, display_.form() == Form::cim);
         if (all.empty())
             return std::nullopt;
-        auto selected =
-            (named ? selection_.withoutSelectors() : selection_).select(std::move(all));
+        auto selected = (named ? selection_.withoutSelectors() : selection_).select(std::move(all));
         write(out, std::move(selected.sensors));
         out.flush();
         for (const std::string& complaint : selected.complaints)
