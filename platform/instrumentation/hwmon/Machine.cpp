@@ -84,8 +84,15 @@ std::size_t attributesFingerprint(const Machine& machine)
     std::size_t sum = 0;
     for (const auto& [chip, id] : machine.chips) {
         std::size_t names = 0;
-        visitEntries(std::string(hwmonFolder) + "/" + chip,
-            [&](int, std::string_view name) { names += std::hash<std::string_view>{}(name); });
+        bool isNamed = false;
+        const auto add = [&](int, std::string_view name) {
+            names += std::hash<std::string_view>{}(name);
+            isNamed = isNamed || name == "name";
+        };
+        const std::string folder = std::string(hwmonFolder) + "/" + chip;
+        visitEntries(folder, add);
+        if (!isNamed) // old drivers have name and attributes in the folder of the device
+            visitEntries(folder + "/device", add);
         sum = sum * 31 + names;
     }
     return sum;

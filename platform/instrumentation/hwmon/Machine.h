@@ -41,7 +41,7 @@ Machine presentMachine();
 std::vector<std::string> enableAttributes(const std::string& chipFolder);
 
 // Returns a number that changes with the names of the attributes of the chips: drivers may add and
-// remove attributes of a registered chip. Lists the folder of each chip.
+// remove attributes of a registered chip. Lists the folder of each chip, or that of its device.
 std::size_t attributesFingerprint(const Machine& machine);
 
 } // namespace Vorn::Hwmon

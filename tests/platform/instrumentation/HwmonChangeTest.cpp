@@ -72,6 +72,18 @@ TEST_F(HwmonChangeTest, AnAttributeThatADriverAddsShowsWithinTwoSeconds)
     EXPECT_EQ(nodes[1].values.reading, 21.0);
 }
 
+TEST_F(HwmonChangeTest, AnAttributeThatAnOldDriverAddsToTheDeviceShowsWithinTwoSeconds)
+{
+    BoundSysfs sysfs("hotplug");
+    sysfs.addChip("hwmon12", "old", "platform", "old.1");
+    sysfs.rename("hwmon/hwmon12/name", "hwmon/hwmon12/device/name");
+    sysfs.write("hwmon/hwmon12/device/temp1_input", "20000\n");
+    EXPECT_THAT(paths(), testing::Contains("/hwmon/old-isa-0001/temp1"));
+    sysfs.write("hwmon/hwmon12/device/temp2_input", "21000\n");
+    std::this_thread::sleep_for(std::chrono::seconds(2));
+    EXPECT_THAT(paths(), testing::Contains("/hwmon/old-isa-0001/temp2"));
+}
+
 TEST_F(HwmonChangeTest, AListedNodeWhoseChipVanishedIsLost)
 {
     BoundSysfs sysfs("hotplug");
