@@ -5,10 +5,12 @@
 #include "host/cimxml/Message.h"
 #include "host/cimxml/RequestError.h"
 #include "host/http/EventLog.h"
+#include "host/http/ResourceCheck.h"
 #include "host/http/Response.h"
 #include "host/http/Service.h"
 
 #include <microhttpd.h>
+#include <sys/socket.h>
 
 #include <chrono>
 #include <exception>
@@ -43,6 +45,15 @@ WorkSlots::Slot takeSlot(WorkSlots& slots)
     return slot;
 }
 
+// Returns whether the client connected to a loopback address.
+bool isLoopback(int descriptor)
+{
+    ::sockaddr_storage raw{};
+    auto* const address = reinterpret_cast<::sockaddr*>(&raw);
+    ::socklen_t size = sizeof raw;
+    return ::getsockname(descriptor, address, &size) == 0 && Address(address).isLoopback();
+}
+
 } // namespace
 
 bool Exchange::begin(const RequestHead& head, std::size_t headSize)
@@ -52,7 +63,7 @@ bool Exchange::begin(const RequestHead& head, std::size_t headSize)
         if (headSize > service_.limits.maximumHeader)
             throw HttpError(MHD_HTTP_REQUEST_HEADER_FIELDS_TOO_LARGE,
                 "a head holds at most " + std::to_string(service_.limits.maximumHeader) + " bytes");
-        head_ = checkHead(head, bodySize_, service_.limits);
+        checkRequest(head);
         caller_.address = client_.address;
         if (service_.signIns.areDemanded())
             signIn(head);
@@ -61,6 +72,19 @@ bool Exchange::begin(const RequestHead& head, std::size_t headSize)
         return refuse();
     }
     return true;
+}
+
+void Exchange::checkRequest(const RequestHead& head)
+{
+    const auto found = service_.resources.find(pathOf(head));
+    if (found == service_.resources.end()) {
+        head_ = checkHead(head, bodySize_, service_.limits);
+        return;
+    }
+    checkHost(head);
+    checkResourceRequest(head, isLoopback(client_.descriptor));
+    resource_ = &found->second.get();
+    resourceHead_ = head;
 }
 
 void Exchange::signIn(const RequestHead& head)
@@ -84,7 +108,7 @@ bool Exchange::isPasswordRight(const Credentials& credentials)
     SignIns& signIns = service_.signIns;
     const auto latest = std::chrono::steady_clock::now() + service_.limits.requestTimeout;
     for (;;) {
-        auto slot = takeSlot(service_.work);
+        auto slot = takeSlot(resource_ == nullptr ? service_.work : service_.readersSigningIn);
         const auto now = std::chrono::steady_clock::now();
         const auto admission = signIns.admit(client_.network, now);
         if (admission <= now) {
@@ -151,6 +175,10 @@ bool Exchange::execute()
 {
     enter(Phase::working);
     try {
+        if (resource_ != nullptr) {
+            readResource();
+            return sendRepresentation();
+        }
         runOperation();
         return sendAnswer();
     } catch (const HttpError& error) {
@@ -181,6 +209,12 @@ void Exchange::runOperation()
     answer_.begin(answer(), service_.unsent);
 }
 
+void Exchange::readResource()
+{
+    const auto slot = takeSlot(service_.readers);
+    representation_ = resource_->represent(resourceHead_);
+}
+
 void Exchange::enter(Phase phase)
 {
     service_.connections.enter(client_, phase);
@@ -198,6 +232,16 @@ bool Exchange::sendAnswer()
     Response response =
         answer_.isWhole() ? Response::whole(answer_.text()) : Response::inPieces(answer_);
     for (const HeaderField& field : answerFieldsFor(head_))
+        response.add(field);
+    if (service_.connections.isShuttingDown())
+        response.endConnection();
+    return send(response, MHD_HTTP_OK);
+}
+
+bool Exchange::sendRepresentation()
+{
+    Response response = Response::whole(*representation_.content);
+    for (const HeaderField& field : representation_.fields)
         response.add(field);
     if (service_.connections.isShuttingDown())
         response.endConnection();
@@ -234,6 +278,8 @@ std::string Exchange::summary(unsigned status) const
     std::string text = std::to_string(status) + " to " + client_.address;
     if (!caller_.principal.empty())
         text += ", \"" + caller_.principal + "\"";
+    if (resource_ != nullptr)
+        text += ", " + resourceHead_.method + " " + resourceHead_.target;
     if (head_.method)
         text += ", " + *head_.method;
     if (head_.object)

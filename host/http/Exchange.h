@@ -7,6 +7,7 @@
 #include "host/http/HeaderCheck.h"
 #include "host/http/HttpError.h"
 #include "host/http/PendingAnswer.h"
+#include "host/http/Resource.h"
 
 #include <cstddef>
 #include <optional>
@@ -45,15 +46,18 @@ private:
         answered,
     };
 
+    void checkRequest(const RequestHead& head);
     void signIn(const RequestHead& head);
     bool isPasswordRight(const Credentials& credentials);
     bool refuse();
     bool receive(std::string_view piece);
     bool execute();
     void runOperation();
+    void readResource();
     void enter(Phase phase);
 
     bool sendAnswer();
+    bool sendRepresentation();
     bool sendError();
     bool send(Response& response, unsigned status);
     std::string summary(unsigned status) const;
@@ -65,6 +69,8 @@ private:
 
     BodySize bodySize_;
     CallHead head_;
+    Resource* resource_ = nullptr; // null for an operation
+    RequestHead resourceHead_;
     CimXml::Caller caller_;
     std::string body_;
     std::size_t discarded_ = 0;
@@ -72,6 +78,7 @@ private:
     std::optional<HttpError> error_;
 
     PendingAnswer answer_;
+    Representation representation_;
     std::string errorText_;
 };
 

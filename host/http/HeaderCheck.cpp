@@ -50,13 +50,6 @@ void checkFields(const RequestHead& head)
     }
 }
 
-// RFC 9112, 3.2.
-void checkHost(const RequestHead& head)
-{
-    if (!head.find("Host") && head.version != "HTTP/1.0")
-        throw HttpError::closing(MHD_HTTP_BAD_REQUEST, "the header field Host is missing");
-}
-
 // Decodes percent signs (RFC 3986, 2.1); one that is not followed by two digits stays.
 std::string decoded(std::string_view text)
 {
@@ -87,7 +80,7 @@ void checkTargetAndMethod(const RequestHead& head)
 {
     const bool isPost = head.method == "POST" || head.method == "M-POST";
     const bool isAsterisk = head.target == "*" && !isPost;
-    const auto path = decoded(pathIn(head.target));
+    const std::string path = pathOf(head);
     if (!isAsterisk && path != "/cimom" && path != "/")
         throw HttpError(MHD_HTTP_NOT_FOUND, "requests go to /cimom");
     if (!isPost)
@@ -204,6 +197,17 @@ BodySize bodySizeOf(const RequestHead& head)
     if (error != std::errc{} || stop != end)
         throw HttpError::closing(MHD_HTTP_BAD_REQUEST, "the Content-Length is no number");
     return body;
+}
+
+void checkHost(const RequestHead& head)
+{
+    if (!head.find("Host") && head.version != "HTTP/1.0")
+        throw HttpError::closing(MHD_HTTP_BAD_REQUEST, "the header field Host is missing");
+}
+
+std::string pathOf(const RequestHead& head)
+{
+    return decoded(pathIn(head.target));
 }
 
 CallHead checkHead(const RequestHead& head, const BodySize& body, const Limits& limits)

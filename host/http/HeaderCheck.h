@@ -33,6 +33,12 @@ struct BodySize {
 // Throws HttpError when the head does not say where the body ends.
 BodySize bodySizeOf(const RequestHead& head);
 
+// Throws HttpError for a request of HTTP/1.1 without a Host (RFC 9112, 3.2).
+void checkHost(const RequestHead& head);
+
+// Returns the path of the target, decoded.
+std::string pathOf(const RequestHead& head);
+
 // Throws HttpError with the answer to a head that breaks a rule of RFC 9110, RFC 9112 or DSP0200.
 CallHead checkHead(const RequestHead& head, const BodySize& body, const Limits& limits);
 

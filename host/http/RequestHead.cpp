@@ -46,6 +46,15 @@ std::optional<std::string_view> RequestHead::find(std::string_view name) const
     return value;
 }
 
+std::vector<std::string_view> parseList(std::string_view text)
+{
+    std::vector<std::string_view> elements;
+    while (!text.empty())
+        if (const std::string_view element = takeUntil(',', text); !element.empty())
+            elements.push_back(element);
+    return elements;
+}
+
 ParameterizedValue parseParameters(std::string_view text)
 {
     ParameterizedValue result{takeUntil(';', text), {}};

@@ -35,6 +35,9 @@ struct ParameterizedValue {
     std::vector<Parameter> parameters;
 };
 
+// Returns the elements of a list with commas between them (RFC 9110, 5.6.1).
+std::vector<std::string_view> parseList(std::string_view text);
+
 // Ignores parameters without an equals sign.
 ParameterizedValue parseParameters(std::string_view text);
 

@@ -6,6 +6,7 @@
 #include "host/http/Address.h"
 #include "host/http/Limits.h"
 #include "host/http/ListeningSocket.h"
+#include "host/http/Resource.h"
 
 #include <chrono>
 #include <list>
@@ -24,11 +25,11 @@ struct Service;
 class Server {
 public:
     // An encrypted socket needs a certificate. Without passwords no client must sign in. The
-    // operations must outlive the server. Throws std::runtime_error and std::system_error when it
-    // cannot start.
+    // operations and the resources must outlive the server. Throws std::runtime_error and
+    // std::system_error when it cannot start.
     Server(CimXml::OperationHandler& operations, std::vector<ListeningSocket> sockets,
         const Limits& limits, std::shared_ptr<const Certificate> certificate = nullptr,
-        std::shared_ptr<const Passwords> passwords = nullptr);
+        std::shared_ptr<const Passwords> passwords = nullptr, Resources resources = {});
     // Begins the shutdown and closes all connections, but blocks until the operations that run and
     // those in the queue have returned.
     ~Server();

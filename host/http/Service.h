@@ -6,10 +6,12 @@
 #include "host/http/Certificate.h"
 #include "host/http/Connections.h"
 #include "host/http/Limits.h"
+#include "host/http/Resource.h"
 #include "host/http/SignIns.h"
 #include "host/http/UnsentObjects.h"
 #include "host/http/WorkSlots.h"
 
+#include <cstddef>
 #include <memory>
 #include <mutex>
 #include <utility>
@@ -41,23 +43,32 @@ private:
     std::shared_ptr<const Certificate> certificate_;
 };
 
+// Requests for resources that are answered at a time; one more is refused.
+inline constexpr std::size_t maximumReaders = 32;
+
 // What all connections of a server share.
 struct Service {
-    Service(CimXml::OperationHandler& handler, const Limits& given,
+    Service(CimXml::OperationHandler& handler, Resources given, const Limits& bounds,
         std::shared_ptr<const Certificate> firstCertificate,
         std::shared_ptr<const Passwords> passwords)
-        : operations(handler), limits(given), certificate(std::move(firstCertificate)),
-          signIns(std::move(passwords), given.signInDelay), unsent(given.maximumUnsentObjects),
-          work(given.workers, given.maximumQueue)
+        : operations(handler), resources(std::move(given)), limits(bounds),
+          certificate(std::move(firstCertificate)),
+          signIns(std::move(passwords), limits.signInDelay), unsent(limits.maximumUnsentObjects),
+          work(limits.workers, limits.maximumQueue), readers(maximumReaders, 0),
+          readersSigningIn(1, limits.maximumQueue)
     {
     }
 
     CimXml::OperationHandler& operations;
+    const Resources resources;
     const Limits limits;
     CurrentCertificate certificate;
     SignIns signIns;
     UnsentObjects unsent;
     WorkSlots work;
+    // Those who read resources wait for no operation, and no operation waits for them.
+    WorkSlots readers;
+    WorkSlots readersSigningIn;
     Connections connections{limits};
 };
 

@@ -129,7 +129,7 @@ protected:
     {
         auto sockets = Host::Http::listenOn(std::move(endpoints));
         port = sockets.front().address().port();
-        server.emplace(operations, std::move(sockets), limits, certificate, passwords);
+        server.emplace(operations, std::move(sockets), limits, certificate, passwords, resources);
     }
 
     HttpClient connect() const { return HttpClient(port); }
@@ -148,6 +148,7 @@ protected:
     }
 
     StubOperations operations;
+    Host::Http::Resources resources;
     Host::Http::Limits limits;
     std::shared_ptr<const Host::Http::Certificate> certificate;
     std::shared_ptr<const Host::Http::Passwords> passwords;

@@ -1,0 +1,32 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#pragma once
+
+#include "host/http/RequestHead.h"
+
+#include <functional>
+#include <map>
+#include <memory>
+#include <string>
+#include <vector>
+
+namespace Host::Http {
+
+struct Representation {
+    std::vector<HeaderField> fields; // with the Content-Type
+    std::shared_ptr<const std::string> content;
+};
+
+// What clients read by GET and HEAD (RFC 9110, 9.3). Thread-safe.
+class Resource {
+public:
+    virtual ~Resource() = default;
+
+    // Returns a representation of the present state. Blocks the connection's thread; the content is
+    // kept until the client has fetched it. Throws HttpError to answer otherwise.
+    virtual Representation represent(const RequestHead& head) = 0;
+};
+
+using Resources = std::map<std::string, std::reference_wrapper<Resource>>; // by path
+
+} // namespace Host::Http

@@ -1,0 +1,95 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "host/http/ResourceCheck.h"
+
+#include "host/broker/Names.h"
+#include "host/http/Address.h"
+
+#include <microhttpd.h>
+#include <unistd.h>
+
+#include <algorithm>
+#include <array>
+#include <charconv>
+#include <climits>
+#include <cstddef>
+#include <stdexcept>
+#include <string>
+
+namespace Host::Http {
+
+namespace {
+
+std::string ownName()
+{
+    std::array<char, HOST_NAME_MAX + 1> name{};
+    ::gethostname(name.data(), name.size() - 1);
+    return name.data();
+}
+
+// Returns the host of a Host field, without the brackets of an IPv6 address (RFC 9110, 7.2).
+std::string_view hostIn(std::string_view field)
+{
+    const std::size_t bracket = field.starts_with('[') ? field.find(']') : std::string_view::npos;
+    return bracket == std::string_view::npos ? field.substr(0, field.rfind(':'))
+                                             : field.substr(1, bracket - 1);
+}
+
+bool isThisMachine(std::string_view host)
+{
+    if (equalNames(host, "localhost") || equalNames(host, ownName()))
+        return true;
+    try {
+        return Address(std::string(host), 0).isLoopback();
+    } catch (const std::invalid_argument&) {
+        return false; // another name
+    }
+}
+
+double weightIn(const ParameterizedValue& range)
+{
+    double weight = 1;
+    for (const auto& [name, value] : range.parameters)
+        if (equalNames(name, "q") &&
+            std::from_chars(value.data(), value.data() + value.size(), weight).ec != std::errc{})
+            return 0;
+    return weight;
+}
+
+bool isOfVersion(const ParameterizedValue& range, std::string_view version)
+{
+    return std::none_of(range.parameters.begin(), range.parameters.end(), [&](const auto& each) {
+        return equalNames(each.name, "version") && withoutQuotes(each.value) != version;
+    });
+}
+
+} // namespace
+
+void checkResourceRequest(const RequestHead& head, bool isLoopback)
+{
+    if (head.method != "GET" && head.method != "HEAD")
+        throw HttpError(MHD_HTTP_METHOD_NOT_ALLOWED, "the resource is read by GET or HEAD", {},
+            {{"Allow", "GET, HEAD"}});
+    const auto host = head.find("Host");
+    if (isLoopback && host && !isThisMachine(hostIn(*host)))
+        throw HttpError(MHD_HTTP_MISDIRECTED_REQUEST,
+            "through a loopback address, the Host must be localhost, a loopback address or " +
+                ownName());
+}
+
+double weightOf(const RequestHead& head, std::string_view mediaType, std::string_view version)
+{
+    double greatest = 0;
+    for (const HeaderField& field : head.fields) {
+        if (!equalNames(field.name, "Accept"))
+            continue;
+        for (const std::string_view element : parseList(field.value)) {
+            const ParameterizedValue range = parseParameters(element);
+            if (equalNames(range.value, mediaType) && isOfVersion(range, version))
+                greatest = std::max(greatest, weightIn(range));
+        }
+    }
+    return greatest;
+}
+
+} // namespace Host::Http
