@@ -30,6 +30,9 @@ public:
 
     // Returns the number of objects that stay in memory as long as the response does.
     virtual std::size_t heldObjects() const noexcept = 0;
+
+    // Returns the status code of the operation (DSP0200); 0 when it succeeded.
+    virtual unsigned status() const noexcept { return 0; }
 };
 
 // Thread-safe.

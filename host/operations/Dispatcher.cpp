@@ -44,8 +44,9 @@ std::unique_ptr<CimXml::Response> Dispatcher::answer(
     try {
         return carryOut(message, caller);
     } catch (const Refusal& refusal) {
+        const CMPIrc code = statusCode(refusal.code());
         return std::make_unique<WrittenResponse>(
-            errorResponse(message, statusCode(refusal.code()), refusal.what()));
+            errorResponse(message, code, refusal.what()), code);
     }
 }
 

@@ -8,6 +8,7 @@
 #include "host/operations/HostName.h"
 #include "host/operations/PullOperations.h"
 
+#include <cstddef>
 #include <memory>
 #include <optional>
 #include <string>
@@ -31,6 +32,9 @@ public:
     // DSP0200 does not have become CIM_ERR_FAILED.
     std::unique_ptr<CimXml::Response> answer(
         const CimXml::Message& message, const CimXml::Caller& caller) override;
+
+    // Returns the number of objects in the memory of open enumerations.
+    std::size_t heldObjects() const { return pulls_.heldObjects(); }
 
 private:
     std::unique_ptr<CimXml::Response> carryOut(

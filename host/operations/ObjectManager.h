@@ -29,6 +29,9 @@ public:
         return dispatcher_.answer(message, caller);
     }
 
+    // Returns the number of objects in the memory of open enumerations.
+    std::size_t heldObjects() const { return dispatcher_.heldObjects(); }
+
 private:
     InteropProvider interop_;
     Manager manager_;

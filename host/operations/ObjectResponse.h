@@ -45,13 +45,18 @@ private:
 // A response that is written already, such as one of an error.
 class WrittenResponse : public CimXml::Response {
 public:
-    explicit WrittenResponse(std::string text) : text_(std::move(text)) {}
+    explicit WrittenResponse(std::string text, unsigned status = 0)
+        : text_(std::move(text)), status_(status)
+    {
+    }
 
     bool append(std::string& out) override;
     std::size_t heldObjects() const noexcept override { return 0; }
+    unsigned status() const noexcept override { return status_; }
 
 private:
     std::string text_; // empty once it was appended
+    unsigned status_;
 };
 
 } // namespace Host

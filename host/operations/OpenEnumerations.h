@@ -66,6 +66,13 @@ public:
     // To be called with operations that use none of the enumerations.
     void removeExpired();
 
+    // Returns the number of objects in memory.
+    std::size_t heldObjects() const
+    {
+        const std::lock_guard lock(mutex_);
+        return heldObjects_;
+    }
+
 private:
     using Time = std::chrono::steady_clock::time_point;
     struct Entry {
@@ -80,7 +87,7 @@ private:
 
     const OperationLimits limits_;
     const Clock clock_;
-    std::mutex mutex_;
+    mutable std::mutex mutex_;
     Table table_;
     std::size_t heldObjects_ = 0;
 };

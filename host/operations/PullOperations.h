@@ -38,6 +38,9 @@ public:
     // Frees the memory of enumerations that have timed out. To be called with each operation.
     void removeExpired() { enumerations_.removeExpired(); }
 
+    // Returns the number of objects in the memory of open enumerations.
+    std::size_t heldObjects() const { return enumerations_.heldObjects(); }
+
 private:
     std::size_t countFor(const CimXml::Operation& operation) const;
 

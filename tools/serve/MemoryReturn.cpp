@@ -34,6 +34,7 @@ public:
 
     bool append(std::string& out) override { return answer_->append(out); }
     std::size_t heldObjects() const noexcept override { return answer_->heldObjects(); }
+    unsigned status() const noexcept override { return answer_->status(); }
 
 private:
     std::unique_ptr<Response> answer_;
