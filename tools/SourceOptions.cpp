@@ -2,7 +2,6 @@
 
 #include "tools/SourceOptions.h"
 
-#include "platform/instrumentation/SourceList.h"
 #include "platform/instrumentation/machinefile/MachineFileSource.h"
 #include "tools/cim/ProviderFile.h"
 
@@ -38,12 +37,15 @@ void SourceOptions::selectMachine() const
     ::setenv("VORN_INSTRUMENTATION", entry.c_str(), 1);
 }
 
+std::vector<Vorn::SourceEntry> SourceOptions::sources()
+{
+    const char* const list = std::getenv("VORN_INSTRUMENTATION");
+    return Vorn::parseSourceList(list == nullptr || *list == '\0' ? "hwmon" : list);
+}
+
 bool SourceOptions::readsHwmon()
 {
-    const char* const sources = std::getenv("VORN_INSTRUMENTATION");
-    if (sources == nullptr || *sources == '\0')
-        return true;
-    const auto entries = Vorn::parseSourceList(sources);
+    const auto entries = sources();
     return std::any_of(entries.begin(), entries.end(),
         [](const Vorn::SourceEntry& entry) { return entry.scheme == "hwmon"; });
 }

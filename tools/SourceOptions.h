@@ -4,10 +4,12 @@
 
 #pragma once
 
+#include "platform/instrumentation/SourceList.h"
 #include "tools/cim/ProviderClient.h"
 
 #include <optional>
 #include <string>
+#include <vector>
 
 namespace CLI {
 class App;
@@ -28,6 +30,10 @@ public:
     // file, the place in it and the reason when it is no model. REQUIRES: no provider is loaded,
     // and there are no other threads.
     void selectMachine() const;
+
+    // Returns the sources of sensors. Throws std::runtime_error for a malformed list of them.
+    // REQUIRES: selectMachine() was called.
+    static std::vector<Vorn::SourceEntry> sources();
 
     // Returns whether the sensors are those of the kernel. REQUIRES: selectMachine() was called.
     static bool readsHwmon();

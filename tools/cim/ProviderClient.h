@@ -48,6 +48,9 @@ public:
     // Returns null when there is none.
     const Host::Instance* instance(const Host::ObjectPath& path);
 
+    // Returns the component that calls the providers.
+    const Host::Manager& manager() const { return manager_; }
+
     // Begins another request, which frees the objects of the one before.
     void beginRequest();
 

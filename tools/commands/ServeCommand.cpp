@@ -4,13 +4,15 @@
 #include "host/http/Server.h"
 #include "host/manager/SensorProfile.h"
 #include "host/operations/ObjectManager.h"
-#include "platform/instrumentation/SourceList.h"
 #include "platform/utilities/ProviderUtilities.h"
 #include "tools/SourceOptions.h"
 #include "tools/UsageError.h"
 #include "tools/cim/Classes.h"
 #include "tools/cim/ProviderClient.h"
 #include "tools/commands/Commands.h"
+#include "tools/metrics/HarvestMetrics.h"
+#include "tools/metrics/MetricsResource.h"
+#include "tools/metrics/RequestCounts.h"
 #include "tools/output/Output.h"
 #include "tools/serve/FreedMemory.h"
 #include "tools/serve/Greeting.h"
@@ -80,10 +82,7 @@ void requireReadable(const std::string& file)
 std::vector<std::string> modelFiles()
 {
     std::vector<std::string> files;
-    const char* const sources = ::getenv("VORN_INSTRUMENTATION");
-    if (sources == nullptr || *sources == '\0')
-        return files;
-    for (const Vorn::SourceEntry& entry : Vorn::parseSourceList(sources))
+    for (const Vorn::SourceEntry& entry : SourceOptions::sources())
         if (entry.scheme == "model")
             files.push_back(entry.argument);
     return files;
@@ -162,14 +161,21 @@ public:
         Host::ObjectManager objects(*classes,
             Host::registeredProfileProviders(files.sensors, files.computerSystem),
             Vorn::getSystemName, options_.operations);
-        MemoryReturn operations(objects);
+        MemoryReturn memoryReturn(objects);
+        RequestCounts operations(memoryReturn);
+        SingleFlight<Harvest> harvests(
+            [&objects] { return std::make_shared<const Harvest>(readHarvest(objects.manager())); });
+        MetricsResource metrics(harvests, [&](Exposition& exposition) {
+            operations.addTo(exposition);
+            addHeldObjects(exposition, objects.heldObjects());
+        });
         beginLog(renounceRoot(options_.user), out);
         for (const std::string& file : modelFiles())
             requireReadable(file);
 
         const std::string text = greeting(sockets, protection.passwords() != nullptr);
         Host::Http::Server server(operations, std::move(sockets), options_.http,
-            protection.certificate(), protection.passwords());
+            protection.certificate(), protection.passwords(), {{"/metrics", metrics}});
         out.write(text);
         out.flush();
         notifyServiceManager("READY=1");

@@ -97,7 +97,7 @@ void writeInPlace(const std::string& path, std::string_view content)
 
 } // namespace
 
-void replaceFile(const std::string& path, std::string_view content)
+void replaceFile(const std::string& path, std::string_view content, std::optional<::mode_t> mode)
 {
     try {
         const std::string target = std::filesystem::weakly_canonical(path).string();
@@ -106,7 +106,9 @@ void replaceFile(const std::string& path, std::string_view content)
         if (exists && !S_ISREG(status.st_mode))
             writeInPlace(target, content);
         else
-            Replacement(target).write(content, exists ? status.st_mode & 07777 : modeOfNewFiles());
+            Replacement(target).write(content, mode     ? *mode
+                                               : exists ? status.st_mode & 07777
+                                                        : modeOfNewFiles());
     } catch (const std::system_error& error) {
         throw std::runtime_error(path + ": " + error.code().message());
     }

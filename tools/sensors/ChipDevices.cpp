@@ -81,7 +81,8 @@ std::optional<std::string> addressIn(const std::string& device)
 std::string slotOf(const std::string& address)
 {
     for (const std::string& slot : entriesOf(slotFolder)) {
-        const std::string place = lineIn(std::string(slotFolder) + "/" + slot + "/address");
+        const std::string place =
+            lineIn(std::string(slotFolder).append("/").append(slot).append("/address"));
         if (!place.empty() && address.starts_with(place + "."))
             return "PCI slot " + slot;
     }

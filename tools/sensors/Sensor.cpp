@@ -59,6 +59,18 @@ std::vector<unsigned> operationalStatusesOf(const Host::Instance& instance)
     return statuses;
 }
 
+// Returns the words of the possible states that can be a CurrentState.
+std::vector<std::string_view> possibleStatesOf(const Host::Instance& instance)
+{
+    std::vector<std::string_view> words;
+    const Host::Value* const value = instance.property("PossibleStates");
+    if (const Host::Array* const array = value == nullptr ? nullptr : value->array())
+        for (const Host::Value& element : array->elements())
+            if (const auto word = wordOfState(element.text().value_or("")))
+                words.push_back(*word);
+    return words;
+}
+
 // Returns the name for a code of SensorType.
 std::string_view kindOf(std::int64_t sensorType)
 {
@@ -118,6 +130,8 @@ Sensor::Sensor(const Host::Instance& from)
         return std::find(statuses.begin(), statuses.end(), status) != statuses.end();
     };
     state = stateOf(textIn(from, "CurrentState"), statuses);
+    possibleStates = possibleStatesOf(from);
+    health = static_cast<unsigned>(numberIn(from, "HealthState").value_or(0));
     const auto enabledState = numberIn(from, "EnabledState");
     const bool isSilent = has(noContact) || enabledState == disabled || enabledState == offline;
     const auto modifier = static_cast<std::int32_t>(numberIn(from, "UnitModifier").value_or(0));

@@ -12,6 +12,7 @@
 #include <optional>
 #include <string>
 #include <string_view>
+#include <vector>
 
 namespace Host {
 class Instance;
@@ -73,7 +74,9 @@ struct Sensor {
     std::array<std::optional<Quantity>, limitKinds.size()> limits; // in the order of limitKinds
 
     SensorState state;
-    const Host::Instance* instance = nullptr; // null when made of no instance
+    std::vector<std::string_view> possibleStates; // words of states, from PossibleStates
+    unsigned health = 0;                          // HealthState
+    const Host::Instance* instance = nullptr;     // null when made of no instance
 };
 
 inline constexpr std::array<const char*, 3> sensorKinds = {"temperature", "voltage", "fan"};

@@ -28,17 +28,27 @@ void sort(Sensors& sensors)
     sensors = std::move(sorted);
 }
 
+} // namespace
+
 std::vector<const char*> propertiesOfSensors()
 {
     std::vector<const char*> names = {"ElementName", "DeviceID", "SensorType", "BaseUnits",
-        "UnitModifier", "CurrentReading", "CurrentState", "OperationalStatus", "EnabledState"};
+        "UnitModifier", "CurrentReading", "CurrentState", "PossibleStates", "OperationalStatus",
+        "EnabledState", "HealthState"};
     for (const LimitKind& limit : limitKinds)
         names.push_back(limit.property);
     names.push_back(nullptr);
     return names;
 }
 
-} // namespace
+Sensors sensorsOf(const Instances& instances)
+{
+    Sensors sensors;
+    sensors.reserve(instances.size());
+    for (const Host::Instance* const each : instances)
+        sensors.emplace_back(*each);
+    return sensors;
+}
 
 bool isListedBefore(const Sensor& first, const Sensor& second)
 {
@@ -53,12 +63,8 @@ bool isListedBefore(const Sensor& first, const Sensor& second)
 Sensors readSensors(ProviderClient& provider, bool isWhole)
 {
     std::vector<const char*> properties = propertiesOfSensors();
-    const Instances instances =
-        provider.instances(sensorClass, isWhole ? nullptr : properties.data());
-    Sensors sensors;
-    sensors.reserve(instances.size());
-    for (const Host::Instance* const each : instances)
-        sensors.emplace_back(*each);
+    Sensors sensors =
+        sensorsOf(provider.instances(sensorClass, isWhole ? nullptr : properties.data()));
     sort(sensors);
     return sensors;
 }

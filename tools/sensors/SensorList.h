@@ -19,6 +19,12 @@ using Sensors = std::vector<Sensor>;
 // Returns whether a sensor comes before another one in a list.
 bool isListedBefore(const Sensor& first, const Sensor& second);
 
+// Returns the properties of which a Sensor is made, with a null at the end.
+std::vector<const char*> propertiesOfSensors();
+
+// Returns the sensors that the instances describe, in their order.
+Sensors sensorsOf(const std::vector<const Host::Instance*>& instances);
+
 // Returns all sensors, with only those properties that a Sensor has unless `isWhole`. Their
 // instances belong to the client's request. Throws as ProviderClient does.
 Sensors readSensors(ProviderClient& provider, bool isWhole);

@@ -51,6 +51,16 @@ SensorState stateOf(std::string_view currentState, std::span<const unsigned> sta
     return row == stateRows.end() ? SensorState{} : row->state;
 }
 
+std::optional<std::string_view> wordOfState(std::string_view currentState)
+{
+    const auto row = std::find_if(stateRows.begin(), stateRows.end(), [&](const StateRow& each) {
+        return each.currentState == currentState && !currentState.empty();
+    });
+    if (row != stateRows.end())
+        return row->state.word;
+    return currentState == "Unknown" ? std::optional(SensorState{}.word) : std::nullopt;
+}
+
 bool isProblem(Urgency urgency)
 {
     return urgency >= Urgency::lost;

@@ -4,6 +4,7 @@
 
 #pragma once
 
+#include <optional>
 #include <span>
 #include <string_view>
 
@@ -20,6 +21,9 @@ struct SensorState {
 // Returns the state with that CurrentState; where this is empty or "Unknown", the one with a code
 // of OperationalStatus. Returns the state "Unknown" for all others.
 SensorState stateOf(std::string_view currentState, std::span<const unsigned> statuses);
+
+// Returns the word for that CurrentState; nothing where no sensor has it.
+std::optional<std::string_view> wordOfState(std::string_view currentState);
 
 // Returns whether a person should look at the sensor.
 bool isProblem(Urgency urgency);

@@ -1,0 +1,299 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// The metrics of `sensorctl metrics` and `sensorctl serve`, as Prometheus reads them. The expected
+// output is that of `sensorctl metrics --model schema/demo-model.json` without the harvest's
+// duration and source.
+
+#include "tests/support/HttpClient.h"
+#include "tests/support/TlsClient.h"
+#include "tests/tools/Scrape.h"
+#include "tests/tools/ServeTest.h"
+
+#include <gmock/gmock.h>
+
+#include <sys/stat.h>
+
+#include <filesystem>
+#include <thread>
+
+namespace {
+
+using namespace Testing;
+using testing::AllOf;
+using testing::Contains;
+using testing::HasSubstr;
+using testing::Not;
+using testing::StartsWith;
+
+const std::string demonstration = SENSOR_PROFILE_SOURCE_DIR "/schema/demo-model.json";
+const std::string golden = SENSOR_PROFILE_SOURCE_DIR "/tests/data/tools/demonstration-metrics.txt";
+
+class MetricsTest : public ServeTest {
+protected:
+    // Returns the metrics of a machine that consists of the nodes.
+    std::string metricsOf(const std::string& nodes) const
+    {
+        const Ended ended = run({"metrics", "--model", model(nodes)});
+        EXPECT_EQ(ended.err, "");
+        return ended.out;
+    }
+};
+
+TEST_F(MetricsTest, OfTheDemonstrationAreTheGoldenOutput)
+{
+    const Ended ended = run({"metrics", "--model", demonstration});
+    EXPECT_EQ(ended.code, 0);
+    EXPECT_EQ(ended.err, "");
+    EXPECT_EQ(comparable(ended.out), contentOf(golden));
+}
+
+TEST_F(MetricsTest, PrometheusFindsNothingToComplainOf)
+{
+    const std::string file =
+        folder_.write("metrics", run({"metrics", "--model", demonstration}).out);
+    const Ended ended = run({"-c", "promtool check metrics <" + file}, {.program = "/bin/sh"});
+    EXPECT_EQ(ended.code, 0);
+    EXPECT_EQ(ended.out + ended.err, "");
+}
+
+TEST_F(MetricsTest, AbsentReadingIsAnAbsentSeries)
+{
+    const std::string text = metricsOf(
+        R"({ "type": "temperature", "path": "/c/a", "description": "A", "status": 13,
+             "baseUnits": 2, "upperCritical": 90.5 })");
+    EXPECT_THAT(text, Not(HasSubstr("\nsensor_profile_reading_celsius")));
+    const std::string labels = R"({device_id="A:/c/a",chip="c",device="",label="A",)";
+    EXPECT_THAT(linesOf(text),
+        AllOf(Contains("sensor_profile_limit_celsius" + labels + "limit=\"upper_critical\"} 90"),
+            Contains("sensor_profile_state" + labels + "state=\"lost\"} 1"),
+            Contains("sensor_profile_state" + labels + "state=\"normal\"} 0")));
+}
+
+TEST_F(MetricsTest, ExactlyOneStateOfASensorIsSet)
+{
+    std::map<std::string, int> set;
+    for (const Series& each : seriesIn(run({"metrics", "--model", demonstration}).out))
+        if (each.name == "sensor_profile_state")
+            set[each.labels.at("device_id")] += each.value == 1 ? 1 : 0;
+    EXPECT_EQ(set.size(), 40U);
+    EXPECT_THAT(set, testing::Each(testing::Pair(testing::_, 1)));
+}
+
+TEST_F(MetricsTest, OfAnotherUnitIsNoFamily)
+{
+    const std::string text = metricsOf(
+        R"({ "type": "temperature", "path": "/c/a", "description": "A", "status": 1,
+             "baseUnits": 3, "reading": 100, "upperCritical": 190 },
+           { "type": "temperature", "path": "/c/b", "description": "B", "status": 1,
+             "reading": 40 })");
+    std::map<std::string, double> readings;
+    for (const Series& each : seriesIn(text)) {
+        EXPECT_THAT(each.name, Not(StartsWith("sensor_profile_limit"))); // 190 degrees Fahrenheit
+        if (each.name == "sensor_profile_reading_celsius")
+            readings[each.labels.at("label")] = each.value;
+    }
+    EXPECT_EQ(readings, (std::map<std::string, double>{{"B", 40}}));
+}
+
+TEST_F(MetricsTest, LabelsAreEscapedAndStayWhole)
+{
+    const std::string name = "\"quoted\" back\\slash\nline\ttab € 𝄞 中 \xF0\xAB\x9D\x80 "
+                             "\xF3\xA0\x81\x81 \xF4\x8F\xBF\xBD \xEF\xBB\xBF";
+    nlohmann::json node = {{"type", "voltage"}, {"path", "/c/ä \"x\""}, {"description", name},
+        {"status", 1}, {"baseUnits", 5}, {"reading", 1.25}};
+    const std::string text = metricsOf(node.dump());
+    const auto all = seriesIn(text);
+    const auto reading = std::find_if(all.begin(), all.end(),
+        [](const Series& each) { return each.name == "sensor_profile_reading_volts"; });
+    ASSERT_NE(reading, all.end());
+    EXPECT_EQ(reading->labels.at("label"), name);
+    EXPECT_EQ(reading->value, 1.25);
+    const Ended ended = run({"-c", "promtool check metrics <" + folder_.write("metrics", text)},
+        {.program = "/bin/sh"});
+    EXPECT_EQ(ended.out + ended.err, "");
+}
+
+TEST_F(MetricsTest, SensorsWithOneLabelDifferByTheirIdentifier)
+{
+    const auto all = seriesIn(run({"metrics", "--model", smallModel()}).out);
+    std::set<std::string> fans;
+    for (const Series& each : all)
+        if (each.name == "sensor_profile_health" && each.labels.at("label") == "Fan")
+            fans.insert(each.labels.at("device_id"));
+    EXPECT_EQ(fans, (std::set<std::string>{"Fan:/board/fan1", "Fan:/board/fan2"}));
+}
+
+TEST_F(MetricsTest, FileIsReplacedAndReadableByAll)
+{
+    const std::string file = (folder_.path() / "sensors.prom").string();
+    const ::mode_t before = ::umask(077);
+    const Ended ended = run({"metrics", "--model", demonstration, "--textfile", file});
+    ::umask(before);
+    EXPECT_EQ(ended.code, 0);
+    EXPECT_EQ(ended.out + ended.err, "");
+    EXPECT_EQ(comparable(contentOf(file)), contentOf(golden));
+    EXPECT_EQ(std::filesystem::status(file).permissions(), std::filesystem::perms(0644));
+    const auto inode = [&] {
+        struct stat status {};
+        ::stat(file.c_str(), &status);
+        return status.st_ino;
+    };
+    const auto first = inode();
+    EXPECT_EQ(run({"metrics", "--model", demonstration, "--textfile", file}).code, 0);
+    EXPECT_NE(inode(), first);
+    EXPECT_EQ(run({"metrics", "--model", demonstration, "--textfile", "/none/x"}).code, 1);
+}
+
+TEST_F(MetricsTest, MachineWithoutSensorsIsTold)
+{
+    const Ended ended = run({"metrics", "--model", model("")});
+    EXPECT_EQ(ended.code, 3);
+    EXPECT_THAT(ended.out, HasSubstr("\nsensor_profile_sensors{kind=\"fan\"} 0\n"));
+    EXPECT_THAT(ended.err, HasSubstr("this machine has no sensors"));
+}
+
+TEST_F(MetricsTest, HarvestThatFailsInTheMiddleGivesWhatIsThere)
+{
+    const std::string broken = folder_.write("broken.json", "{");
+    const std::string whole = smallModel();
+    const std::string refused = folder_.write("refused.json", R"({ "nodes": [
+        { "type": "voltage", "path": "/a", "description": "" },
+        { "type": "temperature", "path": "/b", "description": "B" }]})");
+    const auto up = [](const std::string& text) {
+        std::vector<double> values;
+        for (const Series& each : seriesIn(text))
+            if (each.name == "sensor_profile_source_up")
+                values.push_back(each.value);
+        return values;
+    };
+    const auto of = [](const std::string& sources) {
+        return run({"metrics"}, {.environment = {{"VORN_INSTRUMENTATION", sources}}}).out;
+    };
+    EXPECT_EQ(up(of("model:" + whole)), std::vector<double>{1});
+    EXPECT_EQ(up(of("model:" + whole + ",model:" + broken)), (std::vector<double>{0, 0}));
+    const std::string partly = of("model:" + refused);
+    EXPECT_EQ(up(partly), std::vector<double>{0});
+    EXPECT_THAT(partly, HasSubstr("\nsensor_profile_sensors{kind=\"temperature\"} 1\n"));
+}
+
+// ---- The server ----
+
+std::string get(const std::string& fields = "", const std::string& method = "GET")
+{
+    return method + " /metrics HTTP/1.1\r\nHost: localhost\r\n" + fields + "\r\n";
+}
+
+const std::string acceptOfPrometheus =
+    "Accept: application/openmetrics-text;version=1.0.0,application/openmetrics-text;version=0.0.1;"
+    "q=0.75,text/plain;version=0.0.4;q=0.5,*/*;q=0.1\r\n";
+
+TEST_F(MetricsTest, ServerGivesThoseOfTheCommandAndItsOwn)
+{
+    const ServerProcess server(withModel());
+    ask(HttpClient(server.port()));
+    ask(HttpClient(server.port()), request("", "EnumerateInstances"));
+    ask(HttpClient(server.port()), request("", "CreateEverything"));
+    ask(HttpClient(server.port()), cimRequest("GetClass", cimClassParameter("No_Class")));
+    const HttpReply reply = ask(HttpClient(server.port()), get());
+    EXPECT_EQ(reply.status, 200);
+    EXPECT_EQ(reply.field("content-type"), "text/plain; version=0.0.4; charset=utf-8");
+    EXPECT_EQ(reply.field("vary"), "Accept");
+    const std::string here = comparable(run({"metrics", "--model", smallModel()}).out);
+    EXPECT_THAT(comparable(reply.body), StartsWith(here));
+    const std::string requests = "sensor_profile_requests_total{operation=";
+    EXPECT_THAT(linesOf(reply.body),
+        AllOf(Contains(requests + "\"EnumerateInstanceNames\",result=\"ok\"} 1"),
+            Contains(requests + "\"EnumerateInstances\",result=\"ok\"} 1"),
+            Contains(requests + "\"GetClass\",result=\"CIM_ERR_NOT_FOUND\"} 1"),
+            Contains(requests + "\"other\",result=\"CIM_ERR_NOT_SUPPORTED\"} 1"),
+            Contains("sensor_profile_held_objects 0")));
+    const Ended ended =
+        run({"-c", "promtool check metrics <" + folder_.write("metrics", reply.body)},
+            {.program = "/bin/sh"});
+    EXPECT_EQ(ended.out + ended.err, "");
+}
+
+TEST_F(MetricsTest, OpenEnumerationsHoldObjects)
+{
+    const ServerProcess server(withModel());
+    ask(HttpClient(server.port()), cimRequest("OpenEnumerateInstances",
+                                       cimClassParameter("ZUMLO_NumericSensor") +
+                                           cimParameter("MaxObjectCount", "<VALUE>1</VALUE>")));
+    EXPECT_THAT(linesOf(ask(HttpClient(server.port()), get()).body),
+        Contains("sensor_profile_held_objects 5"));
+}
+
+TEST_F(MetricsTest, OpenMetricsIsGivenToThoseWhoPreferIt)
+{
+    const ServerProcess server({"--model", demonstration});
+    const auto formOf = [&](const std::string& fields) {
+        return ask(HttpClient(server.port()), get(fields)).field("content-type").substr(0, 16);
+    };
+    EXPECT_EQ(formOf(acceptOfPrometheus), "application/open");
+    EXPECT_EQ(formOf("Accept: text/plain;q=0.5, application/openmetrics-text;q=0.4\r\n"),
+        "text/plain; vers");
+    EXPECT_EQ(formOf("Accept: */*\r\n"), "text/plain; vers");
+    EXPECT_EQ(formOf("Accept: application/json\r\n"), "text/plain; vers");
+
+    // The parser of the Python client is strict.
+    const HttpReply reply = ask(HttpClient(server.port()), get(acceptOfPrometheus));
+    const std::string program =
+        "import sys\n"
+        "from prometheus_client.openmetrics.parser import text_string_to_metric_families\n"
+        "families = text_string_to_metric_families(open(sys.argv[1], encoding='utf-8').read())\n"
+        "print(sum(len(family.samples) for family in families))\n";
+    const Ended ended =
+        run({"-c", program, folder_.write("open", reply.body)}, {.program = "/usr/bin/python3"});
+    EXPECT_EQ(ended.err, "");
+    const HttpReply text = ask(HttpClient(server.port()), get());
+    EXPECT_EQ(ended.out, std::to_string(seriesIn(text.body).size()) + "\n");
+}
+
+TEST_F(MetricsTest, SourceThatFailsWhileServingIsShown)
+{
+    const std::string file = smallModel();
+    const ServerProcess server({"--model", file});
+    const std::string up = "sensor_profile_source_up{source=\"model:" + file + "\"} ";
+    EXPECT_THAT(linesOf(ask(HttpClient(server.port()), get()).body), Contains(up + "1"));
+    folder_.write("model.json", "no JSON");
+    EXPECT_THAT(linesOf(ask(HttpClient(server.port()), get()).body), Contains(up + "0"));
+    smallModel();
+    EXPECT_THAT(linesOf(ask(HttpClient(server.port()), get()).body), Contains(up + "1"));
+}
+
+TEST_F(MetricsTest, ServerThatDemandsASignInDemandsItOfScrapesToo)
+{
+    const ServerProcess server(
+        encrypted("localhost", {"--passwords", secret("passwords", userLine)}));
+    TlsClient client(server.port("https"));
+    client.send(get());
+    EXPECT_EQ(client.receive().status, 401);
+    client.send(get(asAnn));
+    EXPECT_EQ(client.receive().status, 200);
+}
+
+TEST_F(MetricsTest, TenThousandSensorsAreScrapedAtOnceByMany)
+{
+    std::string nodes;
+    for (int i = 0; i < 10'000; ++i) {
+        const std::string number = std::to_string(i);
+        nodes += (i == 0 ? "" : ",") + std::string(R"({"type": "temperature", "path": "/b/)") +
+                 number + R"(", "description": "Sensor )" + number +
+                 R"(", "status": 1, "baseUnits": 2, "reading": 41, "upperCritical": 95})";
+    }
+    const ServerProcess server({"--model", model(nodes)});
+    std::vector<std::thread> scrapes;
+    std::atomic<int> whole = 0;
+    for (int i = 0; i < 8; ++i)
+        scrapes.emplace_back([&, i] {
+            const HttpReply reply =
+                ask(HttpClient(server.port()), get(i % 2 == 0 ? acceptOfPrometheus : ""));
+            const bool isWhole = countOf(reply.body, "\nsensor_profile_health{") == 10'000;
+            whole += reply.status == 200 && isWhole ? 1 : 0;
+        });
+    for (std::thread& each : scrapes)
+        each.join();
+    EXPECT_EQ(whole, 8);
+}
+
+} // namespace

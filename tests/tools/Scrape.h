@@ -1,0 +1,62 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// Reads the text format of Prometheus.
+
+#pragma once
+
+#include "tests/support/Texts.h"
+
+#include <map>
+#include <stdexcept>
+#include <string>
+#include <vector>
+
+namespace Testing {
+
+struct Series {
+    std::string name;
+    std::map<std::string, std::string> labels;
+    double value;
+};
+
+inline Series seriesOf(const std::string& line)
+{
+    std::size_t at = line.find_first_of("{ ");
+    Series series{line.substr(0, at), {}, 0};
+    while (line.at(at) != ' ') {
+        const std::size_t equals = line.find("=\"", at);
+        std::string& value = series.labels[line.substr(at + 1, equals - at - 1)];
+        for (at = equals + 2; line.at(at) != '"'; ++at)
+            if (line.at(at) != '\\')
+                value += line.at(at);
+            else
+                value += line.at(++at) == 'n' ? '\n' : line.at(at);
+        if (line.at(++at) == '}')
+            ++at;
+    }
+    series.value = std::stod(line.substr(at));
+    return series;
+}
+
+// Returns the series of an exposition, in its order.
+inline std::vector<Series> seriesIn(const std::string& text)
+{
+    std::vector<Series> all;
+    for (const std::string& line : linesOf(text))
+        if (!line.starts_with('#'))
+            all.push_back(seriesOf(line));
+    return all;
+}
+
+// Returns the lines of an exposition that are the same each time and in each folder.
+inline std::string comparable(const std::string& text)
+{
+    std::string result;
+    for (const std::string& line : linesOf(text))
+        if (!line.starts_with("sensor_profile_harvest_duration_seconds ") &&
+            !line.starts_with("sensor_profile_source_up{source=\"model:"))
+            result += line + "\n";
+    return result;
+}
+
+} // namespace Testing

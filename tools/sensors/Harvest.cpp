@@ -1,0 +1,100 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "tools/sensors/Harvest.h"
+
+#include "host/broker/Refusal.h"
+#include "host/broker/Request.h"
+#include "host/manager/Manager.h"
+#include "platform/instrumentation/OpenSource.h"
+#include "platform/instrumentation/hwmon/Machine.h"
+#include "platform/text/Escape.h"
+#include "platform/text/Utf8.h"
+#include "tools/SourceOptions.h"
+#include "tools/cim/ProviderClient.h"
+#include "tools/sensors/ChipDevices.h"
+
+#include <exception>
+#include <string_view>
+#include <unordered_set>
+
+namespace Tools {
+
+namespace {
+
+using Vorn::NodeLexicon::NodeType;
+
+// Otherwise the tool's list of chips would replace the provider's while that uses it.
+constexpr bool isLibsensorsPrivate = SENSOR_PROFILE_PRIVATE_LIBSENSORS;
+
+Sensors readSensors(const Host::Manager& manager)
+{
+    Host::Request request(manager.broker());
+    std::vector<const char*> properties = propertiesOfSensors();
+    try {
+        Sensors sensors =
+            sensorsOf(manager
+                          .enumerateInstances(request.context(),
+                              request.makePath(nameSpace, sensorClass), properties.data())
+                          .instances());
+        for (Sensor& sensor : sensors)
+            sensor.instance = nullptr;
+        return sensors;
+    } catch (const Host::Refusal&) {
+        return {}; // the states of the sources show it
+    }
+}
+
+// Returns the node's DeviceID.
+std::string identifierOf(const Vorn::Node& node)
+{
+    return node.description + ":" + Text::escapeControls(Text::toValidUtf8(node.path));
+}
+
+using Identifiers = std::unordered_set<std::string_view>;
+
+// Returns whether the source can be listed and the harvest has all its sensors. The provider
+// returns no error where a source cannot be read, nor where it refuses a sensor.
+bool isUp(const Vorn::SourceEntry& entry, const Identifiers& harvested)
+{
+    try {
+        if (entry.scheme == "hwmon" && !isLibsensorsPrivate) {
+            Vorn::Hwmon::presentMachine(); // throws where the chips cannot be listed
+            return true;
+        }
+        const auto source = Vorn::openSource(entry);
+        for (const NodeType type : {NodeType::Temperature, NodeType::Voltage, NodeType::Tachometer})
+            for (const Vorn::Node& node : source->nodes(type))
+                if (!harvested.contains(identifierOf(node)))
+                    return false;
+        return true;
+    } catch (const std::exception&) {
+        return false; // the provider has logged the reason
+    }
+}
+
+std::vector<SourceState> statesOfSources(const Sensors& sensors)
+{
+    Identifiers harvested;
+    for (const Sensor& sensor : sensors)
+        harvested.insert(sensor.deviceId);
+    std::vector<SourceState> states;
+    for (const Vorn::SourceEntry& entry : SourceOptions::sources())
+        states.push_back(
+            {entry.scheme == "hwmon" ? entry.scheme : entry.text, isUp(entry, harvested)});
+    return states;
+}
+
+} // namespace
+
+Harvest readHarvest(const Host::Manager& manager)
+{
+    const auto begin = std::chrono::steady_clock::now();
+    Harvest harvest{readSensors(manager), {}};
+    if (SourceOptions::readsHwmon())
+        nameDevices(harvest.sensors);
+    harvest.sources = statesOfSources(harvest.sensors);
+    harvest.duration = std::chrono::steady_clock::now() - begin;
+    return harvest;
+}
+
+} // namespace Tools
