@@ -63,7 +63,7 @@ TEST(HistoryTest, RangeIsThatOfAllReadings)
     EXPECT_EQ(watched.minimum->value, 3);
     EXPECT_EQ(watched.maximum->value, 9);
     EXPECT_EQ(
-        watched.readings, (std::deque<std::optional<double>>{5.0, 9.0, 3.0, 4.0, std::nullopt}));
+        watched.readings, (std::deque<std::optional<std::int64_t>>{5, 9, 3, 4, std::nullopt}));
 }
 
 TEST(HistoryTest, ReadingsAreBounded)
@@ -71,8 +71,10 @@ TEST(HistoryTest, ReadingsAreBounded)
     History history;
     for (int i = 0; i < 1000; ++i)
         history.update({sensorWith("/a/1", i, normal)}, 0);
-    EXPECT_EQ(history.sensors().at(0)->readings.size(), WatchedSensor::keptReadings);
-    EXPECT_EQ(history.sensors().at(0)->readings.back(), 999);
+    const WatchedSensor& watched = *history.sensors().at(0);
+    EXPECT_EQ(watched.readings.size(), WatchedSensor::keptReadings);
+    EXPECT_EQ(watched.droppedReadings, 1000 - WatchedSensor::keptReadings);
+    EXPECT_EQ(watched.readings.back(), 999);
 }
 
 } // namespace

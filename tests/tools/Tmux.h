@@ -8,7 +8,10 @@
 #include "tests/support/WaitUntil.h"
 #include "tests/tools/ChildProcess.h"
 
+#include <chrono>
+#include <functional>
 #include <string>
+#include <thread>
 #include <vector>
 
 namespace Testing {
@@ -45,12 +48,29 @@ public:
     // Waits until the screen has the text. Returns the screen.
     std::string waitFor(const std::string& text) const
     {
+        return waitForScreen(
+            [&](const std::string& seen) { return seen.find(text) != std::string::npos; });
+    }
+
+    // Waits until the condition holds for the screen. Returns the screen.
+    std::string waitForScreen(const std::function<bool(const std::string&)>& condition) const
+    {
         std::string seen;
-        waitUntil([&] { return (seen = screen()).find(text) != std::string::npos; });
+        waitUntil([&] {
+            seen = screen();
+            return condition(seen) && isComplete(seen);
+        });
         return seen;
     }
 
 private:
+    // A frame that is being drawn differs from the next look at the terminal.
+    bool isComplete(const std::string& seen) const
+    {
+        std::this_thread::sleep_for(std::chrono::milliseconds(20));
+        return screen() == seen;
+    }
+
     std::string call(std::vector<std::string> arguments) const
     {
         arguments.insert(arguments.begin(), {"-S", (folder_.path() / "socket").string()});

@@ -35,7 +35,8 @@ constexpr double greatestInterval = 3600;
 
 constexpr const char* watchFooter =
     "Where standard output is no terminal, it prints a line for each change of state.\n"
-    "MIN, MAX and the curve of the latest readings begin when the command starts.";
+    "MIN, MAX and the curve of the latest 120 readings begin when the command starts.\n"
+    "Where the terminal is narrow, a bar of the curve is the mean of several.";
 
 bool isScreen()
 {

@@ -54,9 +54,11 @@ void History::take(WatchedSensor& watched, const Sensor& present)
     watched.sensor = present;
     watched.sensor.instance = nullptr;
     watched.readings.push_back(
-        present.reading ? std::optional(present.reading->number()) : std::nullopt);
-    if (watched.readings.size() > WatchedSensor::keptReadings)
+        present.reading ? std::optional(present.reading->value) : std::nullopt);
+    if (watched.readings.size() > WatchedSensor::keptReadings) {
         watched.readings.pop_front();
+        ++watched.droppedReadings;
+    }
     if (!present.reading)
         return;
     if (!watched.minimum || present.reading->number() < watched.minimum->number())

@@ -6,6 +6,8 @@
 
 #include "tools/sensors/SensorList.h"
 
+#include <cstddef>
+#include <cstdint>
 #include <ctime>
 #include <deque>
 #include <map>
@@ -22,7 +24,8 @@ struct WatchedSensor {
     Sensor sensor;
     std::optional<Quantity> minimum; // since the first update; nothing before the first reading
     std::optional<Quantity> maximum;
-    std::deque<std::optional<double>> readings; // the latest last
+    std::deque<std::optional<std::int64_t>> readings; // values of quantities, the latest last
+    std::size_t droppedReadings = 0;                  // before these
 };
 
 // A sensor that changed its state, came or went.

@@ -104,7 +104,7 @@ Table WatchView::table(
             if (hasRange)
                 cells.insert(cells.end(), {{limitText(each->minimum)}, {limitText(each->maximum)}});
             if (sparklineWidth > 0)
-                cells.push_back({sparkline(each->readings, sparklineWidth, style.isUtf8)});
+                cells.push_back({sparkline(*each, sparklineWidth, style.isUtf8)});
             table.add(cells);
         }
         return table;
