@@ -22,34 +22,59 @@ const Host::Instance* capabilities(ProviderClient& provider, std::string_view in
     return found == all.end() ? nullptr : *found;
 }
 
+bool isSensorOfKind(const std::vector<std::string>& kinds, const Host::Instance& object)
+{
+    return object.className() == sensorClass && isOfKind(kinds, Sensor(object));
+}
+
+std::string noneOfKind(const std::string& wanted)
+{
+    return "no sensor of that kind matches \"" + wanted + "\"";
+}
+
 } // namespace
 
 ObjectFound ObjectSearch::find(const std::string& wanted)
 {
+    if (const Host::ObjectPath* const path = provider_.readPath(wanted))
+        return findByPath(*path, wanted);
     ObjectFound found;
-    if (const Host::ObjectPath* const path = provider_.readPath(wanted)) {
-        found.object = provider_.instance(*path);
-        found.complaint = "there is no object with the path \"" + wanted + "\"";
-        return found;
-    }
+    bool isOfOtherKind = false;
     for (const Sensor& sensor : sensors()) {
+        if (!selects(wanted, sensor))
+            continue;
+        if (!isOfKind(kinds_, sensor)) {
+            isOfOtherKind = true;
+            continue;
+        }
         if (sensor.deviceId == wanted) {
             found.choices = {sensor};
             break;
         }
-        if (selects(wanted, sensor))
-            found.choices.push_back(sensor);
+        found.choices.push_back(sensor);
     }
     if (found.choices.size() > 1)
         found.complaint = "\"" + wanted + "\" is ambiguous; choose one of its " +
                           std::to_string(found.choices.size()) + " sensors:";
     else if (found.choices.size() == 1)
         found.object = found.choices.front().instance;
-    else
+    else if (kinds_.empty())
         found.object = capabilities(provider_, wanted);
     found.isMachineEmpty = sensors().empty();
     if (found.complaint.empty())
-        found.complaint = nothingMatches(wanted, sensors());
+        found.complaint = isOfOtherKind ? noneOfKind(wanted) : nothingMatches(wanted, sensors());
+    return found;
+}
+
+ObjectFound ObjectSearch::findByPath(const Host::ObjectPath& path, const std::string& wanted) const
+{
+    ObjectFound found;
+    found.object = provider_.instance(path);
+    found.complaint = "there is no object with the path \"" + wanted + "\"";
+    if (found.object != nullptr && !kinds_.empty() && !isSensorOfKind(kinds_, *found.object)) {
+        found.object = nullptr;
+        found.complaint = noneOfKind(wanted);
+    }
     return found;
 }
 

@@ -8,6 +8,11 @@
 
 #include <optional>
 #include <string>
+#include <vector>
+
+namespace Host {
+class ObjectPath;
+}
 
 namespace Tools {
 
@@ -23,8 +28,12 @@ struct ObjectFound {
 // Reads the sensors once, when it needs them first.
 class ObjectSearch {
 public:
-    // The provider must outlive the object.
-    explicit ObjectSearch(ProviderClient& provider) : provider_(provider) {}
+    // Finds sensors of these kinds only; all objects where there are none. Provider and kinds must
+    // outlive the object.
+    ObjectSearch(ProviderClient& provider, const std::vector<std::string>& kinds)
+        : provider_(provider), kinds_(kinds)
+    {
+    }
 
     // Finds an object by object path, by DeviceID, by a selector that only one sensor matches, or
     // by InstanceID, in this order. Throws UsageError for a malformed path, and std::runtime_error
@@ -32,9 +41,11 @@ public:
     ObjectFound find(const std::string& wanted);
 
 private:
+    ObjectFound findByPath(const Host::ObjectPath& path, const std::string& wanted) const;
     const Sensors& sensors();
 
     ProviderClient& provider_;
+    const std::vector<std::string>& kinds_;
     std::optional<Sensors> sensors_;
 };
 

@@ -84,6 +84,22 @@ TEST_F(GetTest, AcceptsWhatOnlyOneSensorMatches)
         EXPECT_EQ(got(wanted).out, got("CPU 2").out) << wanted;
 }
 
+TEST_F(GetTest, KindNarrowsWhatANameMatches)
+{
+    EXPECT_EQ(got("board", {"--kind", "voltage"}).out, got("+12V").out);
+    EXPECT_EQ(got("+12V:/board/in1", {"--kind", "voltage", "--kind", "fan"}).out, got("+12V").out);
+    const std::string path = json::parse(got("+12V", {"--cim"}).out)["instances"][0]["path"];
+    EXPECT_EQ(got(path, {"--kind", "voltage"}).out, got("+12V").out);
+    for (const std::string& wanted : {std::string("board"), std::string("+12V:/board/in1"), path}) {
+        const Ended ended = got(wanted, {"--kind", "temperature"});
+        EXPECT_EQ(ended.code, 3);
+        EXPECT_EQ(ended.out, "");
+        EXPECT_EQ(ended.err, "sensorctl: no sensor of that kind matches \"" + wanted + "\"\n");
+    }
+    EXPECT_EQ(got("ZUMLO:SensorEnabledLogicalElementCap1", {"--kind", "fan"}).code, 3);
+    EXPECT_THAT(got("board", {"--kind", "fan"}).err, HasSubstr("choose one of its 2 sensors"));
+}
+
 TEST_F(GetTest, OffersTheChoicesOfAnAmbiguousNameAsLinesToCopy)
 {
     const Ended ended = got("Fan");

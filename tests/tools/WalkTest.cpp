@@ -75,6 +75,15 @@ TEST_F(WalkTest, BeginsAtAnyObject)
             HasSubstr("\n`- each ManagedElement: GroupComponent " + system_ + " ")));
 }
 
+TEST_F(WalkTest, KindNarrowsWhereItBegins)
+{
+    EXPECT_EQ(walked({"*", "--kind", "fan"}).out, walked({"Fan"}).out);
+    EXPECT_EQ(walked({"Fan", "--kind", "voltage"}).code, 3);
+    const Ended ended = walked({"--kind", "fan"});
+    EXPECT_EQ(ended.code, 2);
+    EXPECT_THAT(ended.err, HasSubstr("--kind requires OBJECT"));
+}
+
 TEST_F(WalkTest, LinesFitTheWidth)
 {
     const Ended ended =

@@ -8,6 +8,7 @@
 #include "tools/cim/ProviderClient.h"
 #include "tools/commands/Commands.h"
 #include "tools/commands/DisplayOptions.h"
+#include "tools/commands/SelectionOptions.h"
 #include "tools/output/JsonDocument.h"
 #include "tools/output/Output.h"
 #include "tools/output/PropertyList.h"
@@ -35,6 +36,7 @@ public:
             ->type_name("");
         parser().add_flag(
             "-v,--verbose", isVerbose_, "Show all properties with the meanings of their codes");
+        selection_.addKind(parser());
         display_.addJson(parser());
         display_.addColor(parser());
         source_.addModel(parser());
@@ -55,7 +57,7 @@ private:
     ObjectFound show(Output& out) const
     {
         ProviderClient provider(source_.providerFiles());
-        ObjectSearch search(provider);
+        ObjectSearch search(provider, selection_.kinds());
         Instances objects;
         Sensors sensors;
         for (const std::string& wanted : wanted_) {
@@ -98,6 +100,7 @@ private:
 
     std::vector<std::string> wanted_;
     bool isVerbose_ = false;
+    SelectionOptions selection_;
     DisplayOptions display_;
     SourceOptions source_;
 };

@@ -18,6 +18,11 @@ void SelectionOptions::addTo(CLI::App& parser)
         .add_option(
             "SELECTOR", selectors_, "Chip, label, path or DeviceID of sensors, or a pattern")
         ->type_name("");
+    addKind(parser);
+}
+
+void SelectionOptions::addKind(CLI::App& parser)
+{
     const std::set<std::string> choices(sensorKinds.begin(), sensorKinds.end());
     parser.add_option("--kind", kinds_, "Only this kind: temperature, voltage or fan")
         ->type_name("KIND")
@@ -39,9 +44,8 @@ SelectionOptions SelectionOptions::withoutSelectors() const
 
 bool SelectionOptions::isSelected(const Sensor& sensor) const
 {
-    const auto isKind = [&](const std::string& kind) { return kind == sensor.kind; };
     const auto isMatch = [&](const std::string& each) { return selects(each, sensor); };
-    return (kinds_.empty() || std::any_of(kinds_.begin(), kinds_.end(), isKind)) &&
+    return isOfKind(kinds_, sensor) &&
            (selectors_.empty() || std::any_of(selectors_.begin(), selectors_.end(), isMatch));
 }
 

@@ -20,10 +20,13 @@ class SelectionOptions {
 public:
     // Adds SELECTOR... and --kind.
     void addTo(CLI::App& parser);
+    // Adds --kind.
+    void addKind(CLI::App& parser);
     // Adds --problems.
     void addProblems(CLI::App& parser);
 
     const std::vector<std::string>& selectors() const { return selectors_; }
+    const std::vector<std::string>& kinds() const { return kinds_; }
     bool isGiven() const { return !selectors_.empty() || !kinds_.empty() || onlyProblems_; }
     // Returns what the other options select.
     SelectionOptions withoutSelectors() const;

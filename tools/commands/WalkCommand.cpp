@@ -9,6 +9,7 @@
 #include "tools/cim/ProviderClient.h"
 #include "tools/commands/Commands.h"
 #include "tools/commands/DisplayOptions.h"
+#include "tools/commands/SelectionOptions.h"
 #include "tools/output/ObjectTree.h"
 #include "tools/output/Output.h"
 
@@ -30,9 +31,12 @@ public:
     explicit WalkCommand(CLI::App& tool)
         : Command(tool, "walk", "Follow the associations from the computer system down")
     {
-        parser()
-            .add_option("OBJECT", wanted_, "Begin at this one; OBJECT as for sensorctl get")
-            ->type_name("");
+        CLI::Option* const object =
+            parser()
+                .add_option("OBJECT", wanted_, "Begin at this one; OBJECT as for sensorctl get")
+                ->type_name("");
+        selection_.addKind(parser());
+        parser().get_option("--kind")->needs(object);
         source_.addModel(parser());
         source_.addProvider(parser());
         display_.addColor(parser());
@@ -71,7 +75,7 @@ private:
     {
         if (!wanted_)
             return provider.instances(computerSystemClass);
-        root = ObjectSearch(provider).find(*wanted_);
+        root = ObjectSearch(provider, selection_.kinds()).find(*wanted_);
         return root.object == nullptr ? Instances{} : Instances{root.object};
     }
 
@@ -100,6 +104,7 @@ private:
     }
 
     std::optional<std::string> wanted_;
+    SelectionOptions selection_;
     SourceOptions source_;
     DisplayOptions display_;
 };

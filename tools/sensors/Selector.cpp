@@ -55,6 +55,11 @@ bool selects(const std::string& selector, const Sensor& sensor)
     });
 }
 
+bool isOfKind(const std::vector<std::string>& kinds, const Sensor& sensor)
+{
+    return kinds.empty() || std::find(kinds.begin(), kinds.end(), sensor.kind) != kinds.end();
+}
+
 std::string nothingMatches(const std::string& selector, const Sensors& sensors)
 {
     std::set<std::tuple<std::size_t, std::size_t, std::string>> nearest; // by distance and length

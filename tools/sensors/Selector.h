@@ -16,6 +16,9 @@ namespace Tools {
 // of fnmatch(3) that one of them matches.
 bool selects(const std::string& selector, const Sensor& sensor);
 
+// Returns whether the sensor is of one of the kinds, or there are none.
+bool isOfKind(const std::vector<std::string>& kinds, const Sensor& sensor);
+
 // Returns a sentence that no sensor matches the selector, with up to three names that are nearest.
 std::string nothingMatches(const std::string& selector, const Sensors& sensors);
 
