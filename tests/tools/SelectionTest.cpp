@@ -76,6 +76,15 @@ TEST_F(SelectionTest, EachSelectorThatNothingMatchesIsSaid)
                         "\"/board/in1\", \"/board/fan1\"");
 }
 
+TEST_F(SelectionTest, NamesAreNearestUpToAThirdOfTheSelector)
+{
+    for (const char* const selector : {"xp", "xyz0", "CPU 1234"})
+        EXPECT_EQ(listed({selector}).err,
+            std::string("sensorctl: no sensor matches \"") + selector + "\"\n");
+    for (const char* const selector : {"cp", "cup0", "xpu0", "baord", "xyu1/t", "CPU 12"})
+        EXPECT_THAT(listed({selector}).err, HasSubstr("; what comes nearest: ")) << selector;
+}
+
 TEST_F(SelectionTest, NothingLeftIsSaidAndEndsWithThree)
 {
     const Ended healthy = listed({"cpu0", "--problems"});

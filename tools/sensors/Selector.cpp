@@ -24,21 +24,27 @@ bool isPattern(std::string_view text)
     return text.find_first_of("*?[") != std::string_view::npos;
 }
 
-// Returns the least number of insertions, deletions and replacements of a character that turn the
-// text into some part of the name, without regard to letter case (Sellers' algorithm).
+// Returns the least number of insertions, deletions and replacements of a character, and of swaps
+// of two, that turn the text into some part of the name, without regard to letter case (Sellers'
+// algorithm).
 std::size_t distanceFrom(std::string_view text, std::string_view name)
 {
-    std::vector<std::size_t> row(name.size() + 1, 0);
+    const auto isSame = [&](std::size_t i, std::size_t j) {
+        return Host::foldCase(text[i]) == Host::foldCase(name[j]);
+    };
+    std::vector<std::size_t> last(name.size() + 1, 0);
+    std::vector<std::size_t> lastButOne;
     for (std::size_t i = 0; i < text.size(); ++i) {
-        std::size_t diagonal = std::exchange(row[0], i + 1);
+        std::vector<std::size_t> row = {i + 1};
         for (std::size_t j = 0; j < name.size(); ++j) {
-            const bool isSame = Host::foldCase(text[i]) == Host::foldCase(name[j]);
-            const std::size_t replaced = diagonal + (isSame ? 0 : 1);
-            diagonal = row[j + 1];
-            row[j + 1] = std::min({replaced, diagonal + 1, row[j] + 1});
+            const std::size_t replaced = last[j] + (isSame(i, j) ? 0 : 1);
+            row.push_back(std::min({replaced, last[j + 1] + 1, row[j] + 1}));
+            if (i > 0 && j > 0 && isSame(i, j - 1) && isSame(i - 1, j))
+                row.back() = std::min(row.back(), lastButOne[j - 1] + 1);
         }
+        lastButOne = std::exchange(last, std::move(row));
     }
-    return *std::min_element(row.begin(), row.end());
+    return *std::min_element(last.begin(), last.end());
 }
 
 } // namespace
@@ -66,7 +72,7 @@ std::string nothingMatches(const std::string& selector, const Sensors& sensors)
     for (const Sensor& sensor : sensors)
         for (const std::string& name : {sensor.chip, sensor.label, sensor.path}) {
             const std::size_t distance = distanceFrom(selector, name);
-            if (distance < selector.size() && 2 * distance <= selector.size())
+            if (!selector.empty() && distance <= selector.size() / 3)
                 nearest.emplace(distance, name.size(), name);
             if (nearest.size() > suggestions)
                 nearest.erase(std::prev(nearest.end()));
