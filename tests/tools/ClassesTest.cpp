@@ -191,6 +191,12 @@ TEST_F(ClassesTest, CodesOfTheSystemHaveTheirMeanings)
                                HasSubstr(" 12 (Not Applicable)\n")));
 }
 
+TEST_F(ClassesTest, CodesOfTheCapabilitiesHaveTheirMeanings)
+{
+    EXPECT_THAT(run({"get", "ZUMLO:SensorEnabledLogicalElementCap1", "--model", smallModel()}).out,
+        HasSubstr("  RequestedStatesSupported  0, 1, 2 (Enabled)\n"));
+}
+
 TEST_F(ClassesTest, PathOfNoObjectIsNotFound)
 {
     for (const char* const path : {"ZUMLO_ComputerSystem.CreationClassName=\"x\",Name=\"y\"",

@@ -2,8 +2,6 @@
 
 #include "tools/cim/Units.h"
 
-#include "tools/cim/ValueMaps.h"
-
 #include <gtest/gtest.h>
 
 #include <cstdint>
@@ -87,40 +85,6 @@ TEST(UnitSymbolTest, IsEmptyWhereNoUnitIsKnown)
 {
     for (const std::uint64_t code : {0U, 1U, 67U, 65535U})
         EXPECT_EQ(unitSymbol(code), "") << code;
-}
-
-TEST(ValueMapsTest, KnowTheirFirstAndLastCodes)
-{
-    struct Expected {
-        const char* property;
-        std::uint64_t code;
-        const char* text;
-    };
-    for (const Expected& expected :
-        {Expected{"SensorType", 0, "Unknown"}, Expected{"SensorType", 5, "Tachometer"},
-            Expected{"SensorType", 16, "Intrusion"}, Expected{"BaseUnits", 2, "Degrees C"},
-            Expected{"BaseUnits", 19, "RPM"}, Expected{"BaseUnits", 37, "Steradians"},
-            Expected{"BaseUnits", 53, "PPM (parts/million)"}, Expected{"BaseUnits", 66, "Pascals"},
-            Expected{"RateUnits", 0, "None"}, Expected{"RateUnits", 9, "Per Year"},
-            Expected{"EnabledState", 3, "Disabled"}, Expected{"EnabledState", 10, "Starting"},
-            Expected{"RequestedState", 2, "Enabled"},
-            Expected{"RequestedState", 12, "Not Applicable"}, Expected{"HealthState", 5, "OK"},
-            Expected{"HealthState", 25, "Critical failure"},
-            Expected{"HealthState", 30, "Non-recoverable error"},
-            Expected{"OperationalStatus", 13, "Lost Communication"},
-            Expected{"OperationalStatus", 19, "Relocating"},
-            Expected{"SupportedThresholds", 5, "UpperThresholdFatal"},
-            Expected{"SettableThresholds", 0, "LowerThresholdNonCritical"}})
-        EXPECT_EQ(meaningOf(expected.property, expected.code), expected.text) << expected.property;
-}
-
-TEST(ValueMapsTest, HaveNoTextForOtherCodesAndProperties)
-{
-    EXPECT_EQ(meaningOf("SensorType", 17), "");
-    EXPECT_EQ(meaningOf("HealthState", 6), "");
-    EXPECT_EQ(meaningOf("RequestedState", 1), "");
-    EXPECT_EQ(meaningOf("OperationalStatus", std::numeric_limits<std::uint64_t>::max()), "");
-    EXPECT_EQ(meaningOf("UnitModifier", 0), "");
 }
 
 } // namespace

@@ -72,6 +72,11 @@ const Host::Instance* ProviderClient::instance(const Host::ObjectPath& path)
     }
 }
 
+const Host::ClassDeclaration* ProviderClient::classOf(const Host::Instance& object) const
+{
+    return classes_->findClass(object.nameSpace(), object.className());
+}
+
 const Host::ObjectPath* ProviderClient::readPath(std::string_view text) const
 {
     return Tools::readPath(request_->arena(), *classes_, text);

@@ -54,6 +54,9 @@ public:
     // Begins another request, which frees the objects of the one before.
     void beginRequest();
 
+    // Returns the class of an object, which the client owns; null for an unknown class.
+    const Host::ClassDeclaration* classOf(const Host::Instance& object) const;
+
     // Returns the path, which the request owns, or null when the text is no path of a known class.
     // Throws UsageError when the path is malformed.
     const Host::ObjectPath* readPath(std::string_view text) const;

@@ -2,9 +2,6 @@
 
 #include "tools/cim/Units.h"
 
-#include "tools/cim/ValueMaps.h"
-
-#include <algorithm>
 #include <array>
 
 namespace Tools {
@@ -13,17 +10,17 @@ namespace {
 
 constexpr std::int32_t largestShift = 18; // digits a 64-bit number can have
 
-struct Symbol {
-    std::uint64_t code;
-    std::string_view text;
-};
-
-constexpr std::array symbols = {Symbol{2, "°C"}, Symbol{3, "°F"}, Symbol{4, "K"}, Symbol{5, "V"},
-    Symbol{6, "A"}, Symbol{7, "W"}, Symbol{8, "J"}, Symbol{9, "C"}, Symbol{10, "VA"},
-    Symbol{15, "kPa"}, Symbol{19, "RPM"}, Symbol{20, "Hz"}, Symbol{21, "s"}, Symbol{65, "%"},
-    Symbol{66, "Pa"}};
-
-constexpr std::uint64_t firstNamedUnit = 2; // 0 is "Unknown", 1 is "Other"
+// The index of each is its code in the value map of CIM_NumericSensor.BaseUnits. It has the map's
+// text where there is no common symbol.
+constexpr std::array<std::string_view, 67> units = {"", "", "°C", "°F", "K", "V", "A", "W", "J",
+    "C", "VA", "Nits", "Lumens", "Lux", "Candelas", "kPa", "PSI", "Newtons", "CFM", "RPM", "Hz",
+    "s", "Minutes", "Hours", "Days", "Weeks", "Mils", "Inches", "Feet", "Cubic Inches",
+    "Cubic Feet", "Meters", "Cubic Centimeters", "Cubic Meters", "Liters", "Fluid Ounces",
+    "Radians", "Steradians", "Revolutions", "Cycles", "Gravities", "Ounces", "Pounds",
+    "Foot-Pounds", "Ounce-Inches", "Gauss", "Gilberts", "Henries", "Farads", "Ohms", "Siemens",
+    "Moles", "Becquerels", "PPM (parts/million)", "Decibels", "DbA", "DbC", "Grays", "Sieverts",
+    "Color Temperature Degrees K", "Bits", "Bytes", "Words (data)", "DoubleWords", "QuadWords", "%",
+    "Pa"};
 
 } // namespace
 
@@ -68,11 +65,7 @@ std::string withoutTrailingZeros(std::string number)
 
 std::string_view unitSymbol(std::uint64_t baseUnits)
 {
-    const auto symbol = std::find_if(symbols.begin(), symbols.end(),
-        [&](const Symbol& candidate) { return candidate.code == baseUnits; });
-    if (symbol != symbols.end())
-        return symbol->text;
-    return baseUnits < firstNamedUnit ? std::string_view{} : meaningOf("BaseUnits", baseUnits);
+    return baseUnits < units.size() ? units.at(static_cast<std::size_t>(baseUnits)) : "";
 }
 
 } // namespace Tools

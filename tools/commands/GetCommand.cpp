@@ -70,11 +70,12 @@ private:
         }
         if (source_.readsHwmon())
             nameDevices(sensors);
-        write(out, objects, sensors);
+        write(out, provider, objects, sensors);
         return {};
     }
 
-    void write(Output& out, const Instances& objects, const Sensors& sensors) const
+    void write(Output& out, const ProviderClient& provider, const Instances& objects,
+        const Sensors& sensors) const
     {
         const std::string_view className = objects.front()->className();
         const bool areOfOneClass = std::all_of(objects.begin(), objects.end(),
@@ -90,9 +91,10 @@ private:
         const char* separator = "";
         for (const Host::Instance* const object : objects) {
             const bool isSensor = object->className() == sensorClass;
-            out.write(
-                separator + (isSensor && !isVerbose_ ? sensorDetails(*sensor, display_.style())
-                                                     : propertyList(*object, display_.style())));
+            out.write(separator + (isSensor && !isVerbose_
+                                          ? sensorDetails(*sensor, display_.style())
+                                          : propertyList(*object, provider.classOf(*object),
+                                                display_.style())));
             sensor += isSensor ? 1 : 0;
             separator = "\n";
         }

@@ -71,7 +71,7 @@ private:
             selectors.size() == 1 ? provider.declaredClass(selectors.front()) : std::nullopt;
         if (named && *named != sensorClass) {
             className = *named;
-            return showObjects(out, className, provider.instances(className));
+            return showObjects(out, provider, className);
         }
         Sensors all = readSensors(provider, display_.form() == Form::cim);
         if (all.empty())
@@ -85,8 +85,9 @@ private:
     }
 
     std::optional<ExitCode> showObjects(
-        Output& out, const std::string& className, const Instances& objects) const
+        Output& out, ProviderClient& provider, const std::string& className) const
     {
+        const Instances objects = provider.instances(className);
         for (const char* const option : {"--kind", "--problems", "--flat", "--csv"})
             if (parser().count(option) != 0)
                 throw UsageError(std::string(option) +
@@ -94,7 +95,7 @@ private:
         if (display_.form() == Form::json || display_.form() == Form::cim)
             writeJson(out, className, objects);
         else if (!objects.empty())
-            out.write(objectTable(objects, display_.style()));
+            out.write(objectTable(provider, objects, display_.style()));
         return objects.empty() ? std::nullopt : std::optional(ExitCode::success);
     }
 

@@ -22,26 +22,25 @@ namespace Tools {
 
 namespace {
 
-using Objects = std::vector<const Host::Instance*>;
-
 // The columns after those of the references, which have other names in each class.
 constexpr std::array<std::string_view, 7> shownProperties = {"DeviceID", "InstanceID", "Name",
     "ElementName", "EnabledState", "HealthState", "OperationalStatus"};
 
-std::string shown(std::string_view property, const Host::Value& value)
+std::string shown(
+    const Host::ClassDeclaration* declared, std::string_view property, const Host::Value& value)
 {
     if (const Host::ObjectPath* const path = value.path())
         return shortName(*path);
     if (const auto text = value.text())
         return std::string(*text);
     if (const auto code = value.unsignedInteger()) {
-        const std::string_view meaning = meaningOf(property, *code);
+        const std::string_view meaning = meaningOf(declared, property, *code);
         return meaning.empty() ? std::to_string(*code) : std::string(meaning);
     }
     if (const Host::Array* const array = value.array()) {
         std::string text;
         for (const Host::Value& element : array->elements())
-            text.append(text.empty() ? "" : ", ").append(shown(property, element));
+            text.append(text.empty() ? "" : ", ").append(shown(declared, property, element));
         return text;
     }
     return Host::toText(value);
@@ -53,7 +52,7 @@ bool contains(const std::vector<std::string>& names, std::string_view name)
         [&](const std::string& known) { return Host::equalNames(known, name); });
 }
 
-std::vector<std::string> columnsOf(const Objects& objects)
+std::vector<std::string> columnsOf(const Instances& objects)
 {
     std::vector<std::string> columns;
     for (const Host::Instance* const object : objects)
@@ -67,7 +66,7 @@ std::vector<std::string> columnsOf(const Objects& objects)
     return columns;
 }
 
-bool areOfSeveralClasses(const Objects& objects)
+bool areOfSeveralClasses(const Instances& objects)
 {
     return std::any_of(objects.begin(), objects.end(), [&](const Host::Instance* object) {
         return object->className() != objects.front()->className();
@@ -81,18 +80,20 @@ std::string titleOf(std::string name)
     return name;
 }
 
-Cell cellOf(const Host::Instance& object, const std::string& property, bool isUtf8)
+Cell cellOf(const Host::Instance& object, const Host::ClassDeclaration* declared,
+    const std::string& property, bool isUtf8)
 {
     const Host::Value* const value = object.property(property);
     if (value == nullptr || value->isNull())
         return {absent, Emphasis::faint};
-    const std::string text = printable(shown(property, *value), isUtf8);
+    const std::string text = printable(shown(declared, property, *value), isUtf8);
     return text.empty() ? Cell{absent, Emphasis::faint} : Cell{text};
 }
 
 } // namespace
 
-std::string objectTable(const Objects& objects, const TextStyle& style)
+std::string objectTable(
+    const ProviderClient& provider, const Instances& objects, const TextStyle& style)
 {
     const std::vector<std::string> properties = columnsOf(objects);
     const bool showsClass = properties.empty() || areOfSeveralClasses(objects);
@@ -104,10 +105,11 @@ std::string objectTable(const Objects& objects, const TextStyle& style)
         columns.push_back({"CLASS"});
     Table table(columns);
     for (const Host::Instance* const object : objects) {
+        const Host::ClassDeclaration* const declared = provider.classOf(*object);
         std::vector<Cell> cells;
         cells.reserve(columns.size());
         for (const std::string& property : properties)
-            cells.push_back(cellOf(*object, property, style.isUtf8));
+            cells.push_back(cellOf(*object, declared, property, style.isUtf8));
         if (showsClass)
             cells.push_back({printable(object->className(), style.isUtf8)});
         table.add(std::move(cells));

@@ -4,19 +4,17 @@
 
 #pragma once
 
+#include "tools/cim/ProviderClient.h"
 #include "tools/output/TextStyle.h"
 
 #include <string>
-#include <vector>
-
-namespace Host {
-class Instance;
-}
 
 namespace Tools {
 
-// Returns a table with the identifying keys (of associations, the short names of their ends),
-// names and states that any of the objects has; also the class where there are several.
-std::string objectTable(const std::vector<const Host::Instance*>& objects, const TextStyle& style);
+// Returns a table of the provider's objects with the identifying keys (of associations, the short
+// names of their ends), names and states that any of the objects has; also the class where there
+// are several.
+std::string objectTable(
+    const ProviderClient& provider, const Instances& objects, const TextStyle& style);
 
 } // namespace Tools

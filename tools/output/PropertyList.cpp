@@ -23,39 +23,45 @@ namespace {
 
 constexpr std::size_t margin = 2;
 
+struct Object {
+    Sensor sensor;
+    const Host::ClassDeclaration* declared;
+};
+
 // Returns the meaning of a number; an empty text when it has none.
-std::string meaningIn(const Sensor& sensor, std::string_view property, const Host::Value& value)
+std::string meaningIn(const Object& object, std::string_view property, const Host::Value& value)
 {
+    const Sensor& sensor = object.sensor;
     if (property == "CurrentReading")
         return sensor.reading ? textWithUnit(sensor.reading, sensor) : "no reading";
     for (std::size_t i = 0; i < limitKinds.size(); ++i)
         if (const auto& limit = sensor.limits.at(i); property == limitKinds.at(i).property)
             return limit ? textWithUnit(limit, sensor) : "out of range";
     const auto code = value.unsignedInteger();
-    return code ? std::string(meaningOf(property, *code)) : std::string{};
+    return code ? std::string(meaningOf(object.declared, property, *code)) : std::string{};
 }
 
-std::string shown(const Sensor& sensor, std::string_view property, const Host::Value& value)
+std::string shown(const Object& object, std::string_view property, const Host::Value& value)
 {
     if (const auto text = value.text())
         return std::string(*text);
     if (const Host::ObjectPath* const path = value.path())
         return path->toText();
-    const std::string meaning = meaningIn(sensor, property, value);
+    const std::string meaning = meaningIn(object, property, value);
     const std::string number = Host::toText(value);
     return meaning.empty() ? number : number + " (" + meaning + ")";
 }
 
 // Returns one item, or an item for each element of an array.
 std::vector<std::string> itemsOf(
-    const Sensor& sensor, std::string_view property, const Host::Value& value, bool isUtf8)
+    const Object& object, std::string_view property, const Host::Value& value, bool isUtf8)
 {
     const Host::Array* const array = value.array();
     if (array == nullptr)
-        return {printable(shown(sensor, property, value), isUtf8)};
+        return {printable(shown(object, property, value), isUtf8)};
     std::vector<std::string> items;
     for (const Host::Value& element : array->elements())
-        items.push_back(printable(shown(sensor, property, element), isUtf8));
+        items.push_back(printable(shown(object, property, element), isUtf8));
     return items;
 }
 
@@ -83,14 +89,15 @@ std::string flow(const std::vector<std::string>& items, std::size_t column, std:
 
 } // namespace
 
-std::string propertyList(const Host::Instance& instance, const TextStyle& style)
+std::string propertyList(
+    const Host::Instance& instance, const Host::ClassDeclaration* declared, const TextStyle& style)
 {
     std::size_t column = 0;
     for (const Host::NamedValue& property : instance.properties())
         column = std::max(column, property.name->text()->size());
     column += 2 * margin;
 
-    const Sensor sensor(instance);
+    const Object object = {Sensor(instance), declared};
     std::string text =
         emphasized(printable(nameOf(instance), style.isUtf8), Emphasis::heading, style.isColored) +
         "\n";
@@ -100,7 +107,7 @@ std::string propertyList(const Host::Instance& instance, const TextStyle& style)
         const std::string_view name = *property.name->text();
         text.append(margin, ' ').append(name).append(column - margin - name.size(), ' ');
         text +=
-            flow(itemsOf(sensor, name, property.value, style.isUtf8), column, style.width) + "\n";
+            flow(itemsOf(object, name, property.value, style.isUtf8), column, style.width) + "\n";
     }
     return text;
 }
