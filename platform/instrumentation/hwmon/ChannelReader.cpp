@@ -2,6 +2,7 @@
 
 #include "platform/instrumentation/hwmon/ChannelReader.h"
 
+#include "platform/instrumentation/Thousandths.h"
 #include "platform/instrumentation/hwmon/ChipList.h"
 #include "platform/text/Trim.h"
 
@@ -13,7 +14,6 @@
 #include <cerrno>
 #include <charconv>
 #include <cmath>
-#include <limits>
 #include <string_view>
 
 namespace Vorn::Hwmon {
@@ -60,24 +60,13 @@ std::optional<double> valueOf(
 
 } // namespace
 
-double keepingMillivolts(double volts)
-{
-    const double millivolts = std::round(volts * 1000.0);
-    const bool isNearest = millivolts / 1000.0 == volts;
-    // Records multiply with this precision.
-    const bool fallsShort = std::fabs(volts * 1000.0L) < std::fabs(millivolts);
-    if (!isNearest || !fallsShort)
-        return volts;
-    return std::nextafter(volts, std::copysign(std::numeric_limits<double>::infinity(), volts));
-}
-
 Channel readChannel(const Chip& chip, int folder, const Feature& feature)
 {
     Channel channel;
     for (const Attribute& attribute : feature.attributes) {
         std::optional<double> value = valueOf(attribute, chip, folder, feature);
         if (value && feature.type == NodeLexicon::NodeType::Voltage)
-            value = keepingMillivolts(*value);
+            value = keepingThousandths(*value);
         attribute.meaning->store(channel, value);
     }
     channel.limits = withoutUnset(channel.limits);

@@ -12,10 +12,4 @@ namespace Vorn::Hwmon {
 // be opened: only computed values can be read then.
 Channel readChannel(const Chip& chip, int folder, const Feature& feature);
 
-// Returns volts whose millivolts, truncated, are the whole number that the hardware reported. Of
-// some numbers the nearest double lies below: 1200 mV divided by 1000 would be truncated to 1199.
-// For these it returns the next double away from zero, for all others the argument. REQUIRES: the
-// argument is finite.
-double keepingMillivolts(double volts);
-
 } // namespace Vorn::Hwmon

@@ -2,6 +2,7 @@
 
 #include "platform/instrumentation/hwmon/NodeReader.h"
 
+#include "platform/instrumentation/NodeStatus.h"
 #include "platform/instrumentation/hwmon/ChannelReader.h"
 #include "platform/instrumentation/hwmon/Status.h"
 
@@ -31,12 +32,11 @@ NodeReader::NodeReader(std::shared_ptr<const Catalogue> catalogue)
 
 NodeReading NodeReader::read(const Feature& feature)
 {
-    constexpr unsigned lostCommunication = 13;
     const Chip& chip = catalogue_->chips[feature.chip];
     const Channel channel = readChannel(chip, folderOf(chip), feature);
     NodeReading values;
     if (!channel.reading && folderId(chip.path) != chip.id) {
-        values.status = lostCommunication;
+        values.status = NodeStatus::lostCommunication;
         return values;
     }
     values.status = statusOf(channel);

@@ -2,21 +2,15 @@
 
 #include "platform/instrumentation/hwmon/Status.h"
 
+#include "platform/instrumentation/NodeStatus.h"
+
 #include <cmath>
 
 namespace Vorn::Hwmon {
 
 namespace {
 
-// Node status codes of the hardware model.
-constexpr unsigned normal = 1;
-constexpr unsigned lostCommunication = 13;
-constexpr unsigned disabled = 16;
-constexpr unsigned warning = 21;
-constexpr unsigned warningLow = 22;
-constexpr unsigned warningHigh = 23;
-constexpr unsigned criticalLow = 25;
-constexpr unsigned criticalHigh = 26;
+using namespace NodeStatus;
 
 bool isUnset(const std::optional<double>& limit)
 {

@@ -3,7 +3,7 @@
 // The whole numbers that the hardware reports, as records publish them.
 
 #include "model/Sensor.h"
-#include "platform/instrumentation/hwmon/ChannelReader.h"
+#include "platform/instrumentation/Thousandths.h"
 #include "tests/platform/instrumentation/HwmonMachine.h"
 
 #include <gtest/gtest.h>
@@ -15,7 +15,7 @@ namespace HwmonPrecisionTests {
 
 using HwmonPrecisionTest = Testing::HwmonTest;
 
-using Vorn::Hwmon::keepingMillivolts;
+using Vorn::keepingThousandths;
 using Vorn::SensorProfileProvider::Sensor;
 
 constexpr unsigned tachometer = 20;
@@ -36,21 +36,21 @@ bool isAtMostOneDoubleAway(double value, double from)
     return value >= std::nextafter(from, -infinity) && value <= std::nextafter(from, infinity);
 }
 
-TEST(KeepingMillivoltsTest, EveryWholeNumberIsPublishedAsItIs)
+TEST(KeepingThousandthsTest, EveryWholeNumberIsPublishedAsItIs)
 {
     for (int number = -largest; number <= largest; ++number) {
-        const double volts = keepingMillivolts(number / 1000.0);
+        const double volts = keepingThousandths(number / 1000.0);
         ASSERT_EQ(published(voltage, volts), number);
         ASSERT_PRED2(isAtMostOneDoubleAway, volts, number / 1000.0);
         ASSERT_EQ(published(tachometer, number), number);
     }
 }
 
-TEST(KeepingMillivoltsTest, OtherVoltagesStayAsTheyAre)
+TEST(KeepingThousandthsTest, OtherVoltagesStayAsTheyAre)
 {
     for (const double volts : {0.0, 1.0, 1.2345, -1.2345, 12.0009999, 1e300, -1e300, 5e-324,
              std::nextafter(1.2, 1.0), std::nextafter(1.2, 2.0)})
-        EXPECT_EQ(keepingMillivolts(volts), volts);
+        EXPECT_EQ(keepingThousandths(volts), volts);
 }
 
 // Each channel of a bound tree is read as the source reads it.
