@@ -22,4 +22,12 @@ inline double keepingThousandths(double number)
     return std::nextafter(number, std::copysign(std::numeric_limits<double>::infinity(), number));
 }
 
+// Returns the nearest double of whole thousandths for which keepingThousandths() returns the
+// argument; the argument if there is none.
+inline double plainThousandths(double number)
+{
+    const double plain = std::round(number * 1000.0) / 1000.0;
+    return keepingThousandths(plain) == number ? plain : number;
+}
+
 } // namespace Vorn

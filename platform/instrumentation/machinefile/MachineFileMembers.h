@@ -7,7 +7,9 @@
 #include "platform/instrumentation/machinefile/MachineFileNode.h"
 
 #include <array>
+#include <optional>
 #include <string_view>
+#include <type_traits>
 
 namespace Vorn::MachineFileMember {
 
@@ -39,6 +41,20 @@ void forEach(Node& node, Visit visit)
     visit("upperCritical", node.values.upperCritical);
     visit("lowerFatal", node.values.lowerFatal);
     visit("upperFatal", node.values.upperFatal);
+}
+
+// Changes the reading and the limits of a node where records publish whole thousandths of them: in
+// volts.
+template <typename Change>
+void changeThousandths(MachineFileNode& node, Change change)
+{
+    if (node.sensorType != static_cast<unsigned>(NodeLexicon::NodeType::Voltage))
+        return;
+    forEach(node, [&](std::string_view /*name*/, auto& field) {
+        if constexpr (std::is_same_v<decltype(field), std::optional<double>&>)
+            if (field)
+                field = change(*field);
+    });
 }
 
 struct TypeName {

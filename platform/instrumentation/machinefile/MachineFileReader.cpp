@@ -2,6 +2,7 @@
 
 #include "platform/instrumentation/machinefile/MachineFileReader.h"
 
+#include "platform/instrumentation/Thousandths.h"
 #include "platform/instrumentation/machinefile/MachineFileMembers.h"
 #include "platform/text/Escape.h"
 #include "platform/text/Utf8.h"
@@ -261,6 +262,7 @@ MachineFileNode nodeOf(const Json& value, const Place& place)
             fail(place, "member \"" + std::string(name) + "\" is missing");
     if (members.count(std::string(Member::sensorType)) == 0)
         node.sensorType = static_cast<unsigned>(node.type);
+    Member::changeThousandths(node, keepingThousandths);
     return node;
 }
 

@@ -2,6 +2,7 @@
 
 #include "platform/instrumentation/machinefile/MachineFileWriter.h"
 
+#include "platform/instrumentation/Thousandths.h"
 #include "platform/instrumentation/machinefile/MachineFileMembers.h"
 #include "platform/text/Utf8.h"
 
@@ -45,8 +46,9 @@ nlohmann::ordered_json toJson(const std::optional<T>& optional)
     return optional ? nlohmann::ordered_json(*optional) : nullptr;
 }
 
-nlohmann::ordered_json toJson(const MachineFileNode& node)
+nlohmann::ordered_json toJson(MachineFileNode node)
 {
+    Member::changeThousandths(node, plainThousandths);
     auto json = nlohmann::ordered_json::object();
     Member::forEach(node, [&](std::string_view name, const auto& field) {
         if (auto value = toJson(field); !value.is_null())

