@@ -40,6 +40,8 @@ _sensorctl() {
   COMPREPLY=()
   if [ "$previous" = --color ]; then
     mapfile -t COMPREPLY < <(compgen -W 'auto always never' -- "$word")
+  elif [ "$previous" = --compatible ]; then
+    mapfile -t COMPREPLY < <(compgen -W 'node_exporter' -- "$word")
   elif [ "$COMP_CWORD" -eq 1 ] && [[ $word != -* ]]; then
     mapfile -t COMPREPLY < <(compgen -W "$(_sensorctl_commands "$tool")" -- "$word")
   elif [[ $word == -* ]] && [ "$COMP_CWORD" -eq 1 ]; then

@@ -49,6 +49,7 @@ TEST(CompletionTest, OffersTheOptionsOfTheCommand)
 TEST(CompletionTest, OffersValues)
 {
     EXPECT_THAT(offersFor({"list", "--color", "a"}), ElementsAre("auto", "always"));
+    EXPECT_THAT(offersFor({"serve", "--compatible", ""}), ElementsAre("node_exporter"));
     EXPECT_THAT(offersFor({"list", "ZUMLO_S"}), Each(StartsWith("ZUMLO_Sensor")));
     EXPECT_THAT(offersFor({"list", "ZUMLO_N"}), ElementsAre("ZUMLO_NumericSensor"));
     for (const char* const option : {"--model", "-o", "--output"})

@@ -48,13 +48,14 @@ inline std::vector<Series> seriesIn(const std::string& text)
     return all;
 }
 
-// Returns the lines of an exposition that are the same each time and in each folder.
+// Returns the lines of an exposition that are the same each time, in each folder and version.
 inline std::string comparable(const std::string& text)
 {
     std::string result;
     for (const std::string& line : linesOf(text))
         if (!line.starts_with("sensor_profile_harvest_duration_seconds ") &&
-            !line.starts_with("sensor_profile_source_up{source=\"model:"))
+            !line.starts_with("sensor_profile_source_up{source=\"model:") &&
+            !line.starts_with("sensor_profile_build_info{"))
             result += line + "\n";
     return result;
 }

@@ -4,7 +4,9 @@
 #include "tools/SourceOptions.h"
 #include "tools/cim/ProviderClient.h"
 #include "tools/commands/Commands.h"
+#include "tools/metrics/CompatibleOption.h"
 #include "tools/metrics/HarvestMetrics.h"
+#include "tools/metrics/HwmonMetrics.h"
 #include "tools/output/FileReplacement.h"
 #include "tools/output/Output.h"
 
@@ -27,9 +29,10 @@ public:
         : Command(tool, "metrics", "Write the sensors as metrics for Prometheus")
     {
         parser()
-            .add_option("--textfile", file_,
-                "Replace this file, for node_exporter, instead of writing to standard output")
+            .add_option(
+                "--textfile", file_, "Replace this file instead of writing to standard output")
             ->type_name("FILE");
+        addCompatible(parser(), compatible_);
         source_.addModel(parser());
         source_.addProvider(parser());
     }
@@ -40,6 +43,8 @@ public:
         const Harvest harvest = readHarvest(ProviderClient(source_.providerFiles()).manager());
         Exposition exposition(ExpositionForm::text);
         addHarvest(exposition, harvest);
+        if (compatible_ && SourceOptions::readsHwmon())
+            addHwmon(exposition);
         const std::string text = std::move(exposition).finish();
         if (file_)
             replaceFile(*file_, text, modeOfTextfile);
@@ -54,6 +59,7 @@ public:
 
 private:
     std::optional<std::string> file_;
+    std::optional<std::string> compatible_;
     SourceOptions source_;
 };
 

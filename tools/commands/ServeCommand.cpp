@@ -11,6 +11,7 @@
 #include "tools/cim/ProviderClient.h"
 #include "tools/commands/Commands.h"
 #include "tools/metrics/HarvestMetrics.h"
+#include "tools/metrics/HwmonMetrics.h"
 #include "tools/metrics/MetricsResource.h"
 #include "tools/metrics/RequestCounts.h"
 #include "tools/output/Output.h"
@@ -168,6 +169,8 @@ public:
         MetricsResource metrics(harvests, [&](Exposition& exposition) {
             operations.addTo(exposition);
             addHeldObjects(exposition, objects.heldObjects());
+            if (options_.compatible && SourceOptions::readsHwmon())
+                addHwmon(exposition);
         });
         beginLog(renounceRoot(options_.user), out);
         for (const std::string& file : modelFiles())

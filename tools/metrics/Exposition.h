@@ -4,6 +4,7 @@
 
 #pragma once
 
+#include <compare>
 #include <string>
 #include <string_view>
 
@@ -21,6 +22,8 @@ public:
     Labels& add(std::string_view name, std::string_view value);
 
     const std::string& text() const { return text_; } // with commas between them
+
+    auto operator<=>(const Labels&) const = default;
 
 private:
     std::string text_;

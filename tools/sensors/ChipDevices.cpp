@@ -3,8 +3,7 @@
 #include "tools/sensors/ChipDevices.h"
 
 #include "platform/text/Trim.h"
-
-#include <dirent.h>
+#include "tools/sensors/FolderEntries.h"
 
 #include <algorithm>
 #include <array>
@@ -34,19 +33,6 @@ std::string lineIn(const std::string& file)
     std::string line;
     std::getline(stream, line);
     return std::string(Text::trimmed(line));
-}
-
-// Returns the names in a folder, in the kernel's order; none when it cannot be read.
-std::vector<std::string> entriesOf(const std::string& folder)
-{
-    std::vector<std::string> names;
-    const std::unique_ptr<DIR, int (*)(DIR*)> directory(::opendir(folder.c_str()), ::closedir);
-    if (!directory)
-        return names;
-    while (const dirent* const entry = ::readdir(directory.get()))
-        if (entry->d_name[0] != '.')
-            names.emplace_back(entry->d_name);
-    return names;
 }
 
 template <typename... Numbers>

@@ -3,6 +3,7 @@
 #include "tools/serve/ServeOptions.h"
 
 #include "tools/UsageError.h"
+#include "tools/metrics/CompatibleOption.h"
 #include "tools/serve/ConfigurationFile.h"
 
 #include <CLI/CLI.hpp>
@@ -131,6 +132,7 @@ void ServeOptions::addTo(CLI::App& parser)
     addFile(parser, "--passwords", passwords, "Users who may sign in (default: everybody may ask)");
     parser.add_option("--user", user, "Serve as this user, when started by root")
         ->type_name("NAME");
+    addCompatible(parser, compatible);
     addFile(parser, "--config", configuration, "Read options from this file, too");
     parser.add_flag("--check", isCheck, "Check the options and their files, and exit");
     addHttpLimits(parser, http);

@@ -23,6 +23,7 @@ struct ServeOptions {
     std::optional<std::string> key;
     std::optional<std::string> passwords;
     std::optional<std::string> user;
+    std::optional<std::string> compatible; // the exporter whose metrics are added
     std::optional<std::string> configuration;
     bool isCheck = false; // whether only the options and their files are checked
     Host::Http::Limits http;

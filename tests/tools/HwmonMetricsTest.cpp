@@ -1,0 +1,188 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// The metrics of captured machines: of their sensors, and those of node_exporter, compared with the
+// real one. The expected output is that of `sensorctl metrics` without the harvest's duration.
+
+#include "tests/support/MountNamespace.h"
+#include "tests/tools/NodeExporter.h"
+#include "tests/tools/Scrape.h"
+#include "tests/tools/ServerProcess.h"
+#include "tests/tools/ToolTest.h"
+
+#include <gmock/gmock.h>
+
+#include <optional>
+
+namespace {
+
+using namespace Testing;
+using testing::HasSubstr;
+
+using Labeled = std::pair<std::string, std::map<std::string, std::string>>;
+
+// Returns the values of the series of node_exporter's collector.
+std::map<Labeled, double> hwmonSeriesIn(const std::string& text)
+{
+    std::map<Labeled, double> values;
+    for (const Series& each : seriesIn(text))
+        if (each.name.starts_with("node_hwmon_")) {
+            EXPECT_TRUE(values.emplace(Labeled(each.name, each.labels), each.value).second)
+                << each.name;
+        }
+    return values;
+}
+
+std::string textOf(const Labeled& series)
+{
+    std::string text = series.first;
+    for (const auto& [name, value] : series.second)
+        text.append(" ").append(name).append("=").append(value);
+    return text;
+}
+
+void expectSame(const std::map<Labeled, double>& ours, const std::map<Labeled, double>& theirs)
+{
+    EXPECT_FALSE(theirs.empty());
+    for (const auto& [series, value] : theirs) {
+        const auto found = ours.find(series);
+        if (found == ours.end())
+            ADD_FAILURE() << "missing: " << textOf(series);
+        else
+            EXPECT_EQ(found->second, value) << textOf(series);
+    }
+    for (const auto& [series, value] : ours)
+        EXPECT_TRUE(theirs.contains(series)) << "too many: " << textOf(series);
+}
+
+std::string compatible()
+{
+    return run({"metrics", "--compatible", "node_exporter"}).out;
+}
+
+class HwmonMetricsTest : public MountNamespaceTest {
+protected:
+    // Binds the tree of a machine; an empty name gives an empty tree.
+    void bind(const std::string& machine)
+    {
+        sysfs_.emplace(machine);
+        configuration_.emplace("");
+    }
+
+    // Adds an attribute of a chip, whose folder is created if need be.
+    void add(const std::string& path, const std::string& content)
+    {
+        std::filesystem::create_directories(sysfs_->path("hwmon/" + path).parent_path());
+        sysfs_->write("hwmon/" + path, content + "\n");
+    }
+
+    std::optional<BoundSysfs> sysfs_;
+    std::optional<BoundSensorsConfiguration> configuration_;
+};
+
+class HwmonMachineTest : public HwmonMetricsTest,
+                         public testing::WithParamInterface<const char*> {};
+
+TEST_P(HwmonMachineTest, MetricsAreTheGoldenOutput)
+{
+    bind(GetParam());
+    const Ended ended = run({"metrics"});
+    EXPECT_EQ(ended.code, 0);
+    EXPECT_EQ(ended.err, "");
+    EXPECT_EQ(comparable(ended.out), contentOf(std::string(SENSOR_PROFILE_SOURCE_DIR) +
+                                               "/tests/data/tools/" + GetParam() + "-metrics.txt"));
+}
+
+INSTANTIATE_TEST_SUITE_P(Machines, HwmonMachineTest, testing::Values("arm", "hotplug", "laptop"),
+    [](const auto& machine) { return std::string(machine.param); });
+
+class NodeExporterTest : public HwmonMetricsTest,
+                         public testing::WithParamInterface<const char*> {};
+
+TEST_P(NodeExporterTest, HasTheSameSeries)
+{
+    bind(GetParam());
+    expectSame(hwmonSeriesIn(compatible()), hwmonSeriesIn(NodeExporter().metrics()));
+}
+
+INSTANTIATE_TEST_SUITE_P(Machines, NodeExporterTest,
+    testing::Values("desktop", "server", "hotplug", "twosocket", "laptop", "arm"),
+    [](const auto& machine) { return std::string(machine.param); });
+
+TEST_F(HwmonMetricsTest, NodeExporterHasTheSameSeriesOfEveryAttribute)
+{
+    bind("");
+    sysfs_->addChip("hwmon0", "Odd Name-2.x", "platform", "Odd-Device.1-");
+    int value = 1000;
+    for (const std::string sensor : {"temp1", "temp12", "in0", "cpu0", "curr1", "power1", "energy1",
+             "humidity1", "fan1", "pwm1", "intrusion0", "freq1", "voltage1", "vid"})
+        for (const std::string element : {"input", "min", "max", "crit", "lcrit", "emergency",
+                 "label", "alarm", "max_alarm", "beep", "fault", "enable", "type", "offset",
+                 "lowest", "highest", "average", "rated_max", "div", "target", "pulses",
+                 "average_interval", "average_interval_max", "average_interval_min", "average_max",
+                 "input_highest", "accuracy", "cap", "cap_hyst", "max_hyst", "mode", "freq",
+                 "auto_channels_temp", "auto_point1_pwm", "auto_point1_temp", "unheard_of"})
+            if (sensor != "pwm1" || element != "input") // pwm1 is an attribute itself
+                add("hwmon0/" + sensor + "_" + element, std::to_string(++value));
+    for (const std::string attribute :
+        {"pwm1", "vrm", "update_interval", "beep_enable", "alarms", "uevent", "in_reset"})
+        add("hwmon0/" + attribute, "1");
+    expectSame(hwmonSeriesIn(compatible()), hwmonSeriesIn(NodeExporter().metrics()));
+}
+
+TEST_F(HwmonMetricsTest, NodeExporterHasTheSameSeriesOfOddChips)
+{
+    bind("");
+    add("hwmon1/name", "values");
+    for (const auto& [attribute, content] :
+        std::map<std::string, std::string>{{"temp1_input", "-5000"}, {"temp2_input", "12.5"},
+            {"temp3_input", "none"}, {"temp4_input", ""}, {"temp5_input", " 42000 "},
+            {"temp6_input", "42000\nmore"}, {"temp7_max", "5000"},
+            {"temp1_label", "  a \"b\" \\ c  "}, {"temp2_label", ""}, {"temp3_label", "alone"},
+            {"temp4_label", "caf\xE9"}, {"temp5_label", "two\nlines"}, {"fan1_label", "ä€𝄞"}})
+        add("hwmon1/" + attribute, content);
+    add("hwmon2/temp1_input", "2000");                     // neither name nor device
+    for (const std::string chip : {"hwmon3", "hwmon10"}) { // two of one name
+        add(chip + "/name", "twice");
+        add(chip + "/temp1_input", chip.substr(5));
+        add(chip + "/temp" + chip.substr(5) + "_input", "1");
+    }
+    add("hwmon4/name", "--");
+    add("hwmon4/temp1_input", "4000");
+    sysfs_->addChip("hwmon5", "both", "pci", "0000:01:00.0");
+    add("hwmon5/temp1_input", "5000");
+    add("hwmon5/device/temp1_input", "5500");
+    add("hwmon5/device/temp2_input", "5600");
+    std::filesystem::create_directories(sysfs_->path("hwmon/hwmon5/device/power"));
+    sysfs_->addChip("hwmon6", "dangling", "pci", "0000:02:00.0");
+    add("hwmon6/temp1_input", "6000");
+    std::filesystem::remove_all(sysfs_->path("devices/0000:02:00.0"));
+    expectSame(hwmonSeriesIn(compatible()), hwmonSeriesIn(NodeExporter().metrics()));
+}
+
+TEST_F(HwmonMetricsTest, ServerHasThoseOfNodeExporterOnRequest)
+{
+    bind("laptop");
+    const auto scrape = [](const std::vector<std::string>& arguments) {
+        const ServerProcess server(arguments);
+        HttpClient client(server.port());
+        client.send("GET /metrics HTTP/1.1\r\nHost: localhost\r\n\r\n");
+        return client.receive().body;
+    };
+    EXPECT_EQ(
+        hwmonSeriesIn(scrape({"--compatible", "node_exporter"})), hwmonSeriesIn(compatible()));
+    EXPECT_TRUE(hwmonSeriesIn(scrape({})).empty());
+    EXPECT_EQ(run({"metrics", "--compatible", "another"}).code, 2);
+}
+
+TEST_F(HwmonMetricsTest, DeviceBehindAChipIsALabel)
+{
+    bind("");
+    sysfs_->addChip("hwmon0", "nvme", "pci", "0000:01:00.0");
+    add("hwmon0/temp1_input", "41000");
+    add("hwmon0/device/model", "SOLIDIGM \"X\"");
+    EXPECT_THAT(run({"metrics"}).out,
+        HasSubstr("sensor_profile_reading_celsius{device_id=\"temp1:/hwmon/nvme-pci-0100/temp1\","
+                  "chip=\"nvme-pci-0100\",device=\"SOLIDIGM \\\"X\\\"\",label=\"temp1\"} 41\n"));
+}
+
+} // namespace
