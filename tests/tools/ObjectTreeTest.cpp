@@ -103,6 +103,24 @@ TEST_F(ObjectTreeTest, WhatIsTheSameBelowSeveralObjectsIsWrittenOnce)
                          "   `- Down e (Link)\n");
 }
 
+TEST_F(ObjectTreeTest, SiblingsAreCounted)
+{
+    link("a", "b");
+    for (const char* const sibling : {"c", "d", "e"})
+        link("a", sibling);
+    EXPECT_EQ(tree("b"), "b (Object)\n"
+                         "`- Up a (Link)\n"
+                         "   `- Down 3 others (Link)\n");
+    link("x", "a");
+    link("c", "f");
+    EXPECT_EQ(tree("b"), "b (Object)\n"
+                         "`- Up a (Link)\n"
+                         "   |- Down 2 others (Link)\n"
+                         "   |- Down c (Link)\n"
+                         "   |  `- Down f (Link)\n"
+                         "   `- Up x (Link)\n");
+}
+
 TEST_F(ObjectTreeTest, CirclesEnd)
 {
     link("a", "b");

@@ -24,7 +24,7 @@ namespace {
 constexpr const char* walkFooter =
     "Each line names an object by its role in an association, with the class of the\n"
     "association. ... stands where more was shown before, `each' for all objects with\n"
-    "that role.";
+    "that role, `others' for those that are related like the object above.";
 
 class WalkCommand : public Command {
 public:

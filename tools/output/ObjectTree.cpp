@@ -72,11 +72,41 @@ private:
         });
     }
 
-    // The recursion ends despite cycles, since each step increases the distance from the root.
-    void writeBelow(Index object, const std::string& indent)
+    // Returns the link of an object by which a link to it leads back.
+    const Link& linkBack(Index from, const Link& link) const
+    {
+        const std::vector<Link>& links = graph_.links(link.target);
+        return *std::find_if(links.begin(), links.end(), [&](const Link& each) {
+            return each.target == from && each.associationClass == link.associationClass;
+        });
+    }
+
+    // Removes the links to siblings of the object to which a link leads back: the objects with its
+    // role in the same association, below which nothing is shown. Keeps a single one. Returns how
+    // many it removed.
+    std::size_t removeSiblings(std::vector<const Link*>& links, const Link& back) const
+    {
+        std::vector<const Link*> others = links;
+        const std::size_t removed = std::erase_if(others, [&](const Link* link) {
+            return link->role == back.role && link->associationClass == back.associationClass &&
+                   shownLinks(link->target).empty();
+        });
+        if (removed < 2)
+            return 0;
+        links = std::move(others);
+        return removed;
+    }
+
+    // Leaves out the siblings of the object to which a link leads back. The recursion ends despite
+    // cycles, since each step increases the distance from the root.
+    void writeBelow(Index object, const std::string& indent, const Link* back = nullptr)
     {
         isDescended_[object] = true;
-        const std::vector<const Link*> links = shownLinks(object);
+        std::vector<const Link*> links = shownLinks(object);
+        const std::size_t siblings = back == nullptr ? 0 : removeSiblings(links, *back);
+        if (siblings > 0)
+            writeLine(indent + branchOf(links.empty()).object,
+                back->role + " " + std::to_string(siblings) + " others", remarkOf(*back));
         const bool isFolded = isSameBelow(object, links);
         for (std::size_t i = 0; i < links.size(); ++i) {
             const Branch& branch = branchOf(i + 1 == links.size() && !isFolded);
@@ -118,7 +148,7 @@ private:
         const bool hidesSome = (isRepeated || !leadsAway) && !shownLinks(link.target).empty();
         writeLine(before + whose, nameOf(link), remarkOf(link) + (hidesSome ? " ..." : ""));
         if (leadsAway && !isRepeated)
-            writeBelow(link.target, indentBelow);
+            writeBelow(link.target, indentBelow, &linkBack(object, link));
     }
 
     const Branch& branchOf(bool isLast) const
