@@ -103,6 +103,19 @@ TEST_F(ClassesTest, UnknownClassIsASelectorThatNothingMatches)
     EXPECT_EQ(ended.err, "sensorctl: no sensor matches \"ZUMLO_Unheard\"\n");
 }
 
+// The registration of the profile needs the namespaces of a server.
+TEST_F(ClassesTest, ClassThatOnlyServersServeIsSaid)
+{
+    for (const std::string className : {"ZUMLO_SensorRegisteredProfile",
+             "ZUMLO_SensorElementConformsToProfile", "CIM_Namespace"}) {
+        const Ended ended = listed(className);
+        EXPECT_EQ(ended.code, 1);
+        EXPECT_EQ(ended.out, "");
+        EXPECT_EQ(
+            ended.err, "sensorctl: no provider serves the class " + className + " (code 7)\n");
+    }
+}
+
 TEST_F(ClassesTest, SomeOptionsAreForSensors)
 {
     for (const std::vector<std::string>& options : std::vector<std::vector<std::string>>{

@@ -37,8 +37,10 @@ ProviderClient::ProviderClient(const ProviderFiles& files)
 
 std::optional<std::string> ProviderClient::declaredClass(std::string_view className) const
 {
-    const Host::ClassDeclaration* const declared = classes_->findClass(nameSpace, className);
-    return declared == nullptr ? std::nullopt : std::optional(declared->name);
+    for (const auto& each : classes_->namespaces())
+        if (const Host::ClassDeclaration* const declared = each->findClass(className))
+            return declared->name;
+    return std::nullopt;
 }
 
 void ProviderClient::beginRequest()
@@ -50,6 +52,9 @@ Instances ProviderClient::instances(const std::string& className, const char** p
 {
     Host::CollectedResult answer;
     try {
+        if (classes_->findClass(nameSpace, className) == nullptr) // it is one of root/interop
+            throw Host::Refusal(
+                CMPI_RC_ERR_NOT_SUPPORTED, "no provider serves the class " + className);
         answer = manager_.enumerateInstances(
             request_->context(), request_->makePath(nameSpace, className), properties);
     } catch (const Host::Refusal& refusal) {

@@ -36,7 +36,7 @@ class ProviderClient {
 public:
     explicit ProviderClient(const ProviderFiles& files);
 
-    // Returns the class's name as it is declared; nothing for an unknown class.
+    // Returns the class's name as it is declared in any namespace; nothing for an unknown class.
     std::optional<std::string> declaredClass(std::string_view className) const;
     // Return the names of the served classes, and of the associations among them.
     const std::vector<std::string>& servedClasses() const { return served_; }
