@@ -1,6 +1,8 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Runs `sensorctl serve` as a child process, for the machine that VORN_INSTRUMENTATION selects.
+// Runs `sensorctl serve` as a child process, for the machine that VORN_INSTRUMENTATION selects. It
+// waits for the first line in a pipe, so that the measured start is exact: the tests' class of this
+// name looks into a file every few milliseconds.
 
 #pragma once
 
