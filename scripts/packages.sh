@@ -18,7 +18,8 @@ check_packages=(
   libbenchmark-dev libgmock-dev libgtest-dev
   binutils lm-sensors locales python3-jsonschema util-linux
   openssl sblim-wbemcli tmux
-  prometheus prometheus-node-exporter python3-prometheus-client
+  prometheus prometheus-alertmanager prometheus-node-exporter victoria-metrics
+  python3-prometheus-client python3-yaml
   debootstrap dpkg-dev file iproute2 jq lintian man-db mandoc rpm rpmlint shellcheck systemd valgrind
 )
 
@@ -32,6 +33,9 @@ bench_packages=(
   libbenchmark-dev
   iproute2 lm-sensors util-linux
 )
+
+# Packages whose programs are needed, but not the services that their installation starts.
+service_packages=(prometheus prometheus-alertmanager prometheus-node-exporter victoria-metrics)
 
 # Prints the packages of the list that are not installed, one per line.
 missing_packages() {
@@ -52,6 +56,24 @@ size_of_packages() {
       /^After this operation/ { print " (" download " to download, " $4 " " $5 " on the disk)" }'
 }
 
+# Masks the services of packages of the list, so that their installation starts none. The arguments
+# before `--` are put in front of the command.
+mask_services() {
+  local as_root=() package services=()
+  while [ "$1" != -- ]; do
+    as_root+=("$1")
+    shift
+  done
+  shift
+  [ -d /run/systemd/system ] || return 0
+  for package in "$@"; do
+    [[ " ${service_packages[*]} " != *" $package "* ]] || services+=("$package.service")
+  done
+  [ ${#services[@]} -gt 0 ] || return 0
+  echo "Masking ${services[*]}; \`systemctl unmask\` undoes that" >&2
+  "${as_root[@]}" systemctl mask --quiet "${services[@]}"
+}
+
 # Installs the missing packages of the list, with sudo when not root. The output of apt-get is
 # printed only when it fails. Where the packages cannot be installed, the command for root is
 # printed. All output goes to standard error, so that it does not mix with that of the caller.
@@ -64,6 +86,7 @@ install_packages() {
     # A machine that has just started may hold the lock while it updates itself.
     if "${as_root[@]}" apt-get update >"$log" 2>&1 &&
       echo "Installing ${#missing[@]} packages$(size_of_packages "${missing[@]}"): ${missing[*]}" >&2 &&
+      mask_services "${as_root[@]}" -- "${missing[@]}" &&
       "${as_root[@]}" env DEBIAN_FRONTEND=noninteractive apt-get -o DPkg::Lock::Timeout=300 \
         install --yes --no-install-recommends "${missing[@]}" >"$log" 2>&1 </dev/null; then
       rm "$log"
