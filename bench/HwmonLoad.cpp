@@ -264,6 +264,11 @@ void compare(int wanted, std::size_t rounds)
         expect(Bench::skim(client) > sensors, "a closed connection");
     };
 
+    const auto scrape = [&] {
+        client.send("GET /metrics HTTP/1.1\r\nHost: localhost\r\n\r\n");
+        expect(Bench::skim(client) > sensors, "a closed connection");
+    };
+
     std::vector<Row> rows = {{"raw reads", "raw reads", [&] { return costOf(std::cref(raw)); }},
         {"libsensors", "raw reads", [&] { return costOf([&] { readBySubfeatures(attributes); }); }},
         {"harvest", "raw reads", [&] { return costOf([&] { harvest(sensors); }); }},
@@ -272,6 +277,8 @@ void compare(int wanted, std::size_t rounds)
         {"GetInstance", "harvest", [&] { return costOf(getInstance); }},
         {"EnumerateInstances of the server", "EnumInstances",
             [&] { return costOf(overHttp, clockOf(server.id())); }},
+        {"GET /metrics of the server", "EnumInstances",
+            [&] { return costOf(scrape, clockOf(server.id())); }},
         {"sensors -j", "sensors -j", [] { return program("/usr/bin/sensors", {"-j"}); }},
         {"sensorctl list", "sensors -j", [] { return program(Testing::sensorctl, {"list"}); }},
         {"sensorctl list --json", "sensors -j", [] {

@@ -57,10 +57,10 @@ std::string getInstance(std::int64_t sensors)
             Testing::cimInstanceName(Class, {{"DeviceID", ModelMachine::someDeviceID(sensors)}})));
 }
 
-// Throws unless the answer has so many instances.
-void check(const Testing::HttpReply& reply, std::int64_t instances)
+// Throws unless the answer has so many instances, or other parts that begin in that way.
+void check(const Testing::HttpReply& reply, std::int64_t count, const char* part = "<INSTANCE ")
 {
-    if (static_cast<std::int64_t>(Testing::countOf(reply.body, "<INSTANCE ")) != instances)
+    if (static_cast<std::int64_t>(Testing::countOf(reply.body, part)) != count)
         throw std::runtime_error("a request failed: " + reply.body.substr(0, 500));
 }
 
@@ -69,14 +69,26 @@ struct Load {
     std::int64_t sensors;
     std::string request;
     std::int64_t instances; // of the answer
+    const char* part = "<INSTANCE ";
 };
+
+Load enumeration(std::int64_t sensors)
+{
+    return {"EnumerateInstances", sensors, enumerateInstances(), sensors};
+}
+
+Load scrape(std::int64_t sensors)
+{
+    return {"GET /metrics", sensors, "GET /metrics HTTP/1.1\r\nHost: localhost\r\n\r\n", sensors,
+        "\nsensor_profile_health{"};
+}
 
 // Sends one request after another on one connection. The first answer is checked and not measured.
 Durations askUntil(Clock::time_point end, std::uint16_t port, const Load& load)
 {
     HttpClient client(port);
     client.send(load.request);
-    check(client.receive(), load.instances);
+    check(client.receive(), load.instances, load.part);
     Durations durations;
     do {
         const auto begin = Clock::now();
@@ -87,13 +99,25 @@ Durations askUntil(Clock::time_point end, std::uint16_t port, const Load& load)
     return durations;
 }
 
+using Clients = std::vector<std::future<Durations>>;
+
+Clients start(const Load& load, unsigned clients, Clock::time_point end, std::uint16_t port)
+{
+    Clients asked;
+    for (unsigned i = 0; i < clients; ++i)
+        asked.push_back(std::async(std::launch::async, askUntil, end, port, std::cref(load)));
+    return asked;
+}
+
+Clock::time_point after(Seconds time)
+{
+    return Clock::now() + std::chrono::duration_cast<Clock::duration>(time);
+}
+
 void printLoad(const Load& load, unsigned clients, Seconds time, std::uint16_t port)
 {
     const auto begin = Clock::now();
-    const auto end = begin + std::chrono::duration_cast<Clock::duration>(time);
-    std::vector<std::future<Durations>> asked;
-    for (unsigned i = 0; i < clients; ++i)
-        asked.push_back(std::async(std::launch::async, askUntil, end, port, std::cref(load)));
+    Clients asked = start(load, clients, after(time), port);
     Durations all;
     for (std::future<Durations>& each : asked) {
         const Durations own = each.get();
@@ -114,9 +138,24 @@ void printLoads(Seconds time)
         const ModelMachine machine(sensors);
         const ServerProcess server;
         for (const Load& load : {Load{"GetInstance", sensors, getInstance(sensors), 1},
-                 Load{"EnumerateInstances", sensors, enumerateInstances(), sensors}})
+                 enumeration(sensors), scrape(sensors)})
             for (const unsigned clients : {1U, 8U})
                 printLoad(load, clients, time, server.port());
+    }
+}
+
+// Prints what scrapes and operations cost each other.
+void printMixture(Seconds time)
+{
+    constexpr std::int64_t sensors = 1000;
+    constexpr unsigned others = 48; // of 64 connections that an address may have
+    const ModelMachine machine(sensors);
+    const ServerProcess server;
+    for (const auto& [load, beside] : {std::pair(scrape(sensors), enumeration(sensors)),
+             {enumeration(sensors), scrape(sensors)}}) {
+        std::printf("beside %u clients that send %s:\n", others, beside.operation);
+        const Clients busy = start(beside, others, after(2 * time), server.port());
+        printLoad(load, 1, time, server.port());
     }
 }
 
@@ -210,6 +249,7 @@ int main(int argc, char** argv)
         printComparison();
         printLargeAnswer();
         printLoads(time);
+        printMixture(time);
         return 0;
     } catch (const std::exception& error) {
         std::fprintf(stderr, "bench_server: %s\n", error.what());

@@ -8,6 +8,7 @@
 #include "host/http/BasicCredentials.h"
 #include "host/http/HeaderCheck.h"
 #include "host/http/Passwords.h"
+#include "host/http/ResourceCheck.h"
 
 #include <algorithm>
 #include <cstddef>
@@ -63,6 +64,11 @@ void check(const Request& request)
     const Host::Http::Limits limits;
     try {
         const auto size = Host::Http::bodySizeOf(request.head);
+        const double weight = weightOf(request.head, "text/plain", "0.0.4");
+        if (!(weight >= 0 && weight <= 1))
+            std::abort();
+        if (Host::Http::pathOf(request.head) == "/metrics")
+            return checkResourceRequest(request.head, true);
         const auto call = Host::Http::checkHead(request.head, size, limits);
         if (call.extension && call.extension->size() != 2)
             std::abort();

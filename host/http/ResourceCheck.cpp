@@ -53,7 +53,7 @@ double weightIn(const ParameterizedValue& range)
         if (equalNames(name, "q") &&
             std::from_chars(value.data(), value.data() + value.size(), weight).ec != std::errc{})
             return 0;
-    return weight;
+    return weight >= 0 && weight <= 1 ? weight : 0;
 }
 
 bool isOfVersion(const ParameterizedValue& range, std::string_view version)

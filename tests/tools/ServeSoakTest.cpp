@@ -77,6 +77,7 @@ int sensorsOf(const HttpReply& reply)
 // Counts the answers with and without the sensor of the chip.
 struct Seen {
     std::atomic<int> answers{0};
+    std::atomic<int> scrapes{0};
     std::atomic<int> withChip{0};
     std::atomic<int> withoutChip{0};
 };
@@ -116,6 +117,19 @@ protected:
         }
     }
 
+    // Scrapes ten times. A chip that disappears during the harvest may be missing or lost.
+    void scrape()
+    {
+        HttpClient client(server_->port());
+        for (int i = 0; i < 10; ++i) {
+            client.send("GET /metrics HTTP/1.1\r\nHost: localhost\r\n\r\n");
+            const HttpReply reply = client.receive();
+            const std::size_t sensors = countOf(reply.body, "\nsensor_profile_health{");
+            ++seen_.scrapes;
+            ASSERT_TRUE(reply.status == 200 && sensors >= 2 && sensors <= 3) << reply.body;
+        }
+    }
+
     // Closes a connection in the middle of the answer, and another one in the middle of the
     // request.
     void breakOff()
@@ -150,6 +164,8 @@ protected:
         keep([&] { askAll(connect(), devicesOfTheSystem(), 2, 3); });
         keep([&] { askAll(connect(), oneSensor(), 1, 1); });
         keep([this] { breakOff(); });
+        keep([this] { scrape(); });
+        keep([this] { scrape(); });
         while (Clock::now() < end) {
             sysfs_->rename("hwmon/hwmon2", "gone");
             std::this_thread::sleep_for(30ms);
@@ -161,6 +177,7 @@ protected:
         // The last request may have listed the machine without the chip, whose folder is not open
         // then.
         askAll(HttpClient(server_->port()), allSensors, 3, 3);
+        scrape();
     }
 
     std::size_t residentKilobytes() const
@@ -204,8 +221,9 @@ TEST_F(ServeSoakTest, ErrorsAreNotTakenForAnswers)
 
 TEST_F(ServeSoakTest, NothingStaysBehindWhileTheMachineChanges)
 {
-    // The folder of each chip stays open once the machine has been listed.
-    const std::size_t descriptorsAtRest = descriptors() + 3;
+    // The folder of each chip stays open once the machine has been listed, by the provider and, for
+    // the metrics, by the tool.
+    const std::size_t descriptorsAtRest = descriptors() + 3 + 3;
     soak(3s);
     ASSERT_TRUE(waitForDescriptors(descriptorsAtRest)) << descriptors();
     const std::size_t residentBefore = residentKilobytes();
@@ -213,10 +231,12 @@ TEST_F(ServeSoakTest, NothingStaysBehindWhileTheMachineChanges)
     EXPECT_TRUE(waitForDescriptors(descriptorsAtRest)) << descriptors();
     const std::size_t residentAfter = residentKilobytes();
     RecordProperty("answers", seen_.answers);
+    RecordProperty("scrapes", seen_.scrapes);
     RecordProperty("withoutChip", seen_.withoutChip);
     RecordProperty("residentBefore", std::to_string(residentBefore));
     RecordProperty("residentAfter", std::to_string(residentAfter));
     EXPECT_GT(seen_.answers, 100);
+    EXPECT_GT(seen_.scrapes, 100);
     EXPECT_GT(seen_.withChip, 0);
     EXPECT_GT(seen_.withoutChip, 0);
     EXPECT_LT(residentAfter, residentBefore + std::size_t{SENSOR_PROFILE_SOAK_GROWTH} * 1024);

@@ -4,6 +4,9 @@
 
 #include "host/http/ResourceCheck.h"
 #include "tools/metrics/HarvestMetrics.h"
+#include "tools/serve/FreedMemory.h"
+
+#include <malloc.h>
 
 #include <cstddef>
 #include <utility>
@@ -50,7 +53,12 @@ Host::Http::Representation MetricsResource::represent(const Host::Http::RequestH
 std::shared_ptr<const MetricsResource::Text> MetricsResource::write(ExpositionForm form)
 {
     Exposition exposition(form);
-    addHarvest(exposition, *harvests_.get());
+    auto harvest = harvests_.get();
+    const std::size_t sensors = harvest->sensors.size();
+    addHarvest(exposition, *harvest);
+    harvest.reset();
+    if (sensors >= largeAnswer)
+        ::malloc_trim(0);
     addMore_(exposition);
     auto text = std::make_shared<Text>();
     text->content = std::move(exposition).finish();

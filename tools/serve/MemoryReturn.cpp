@@ -3,6 +3,7 @@
 #include "tools/serve/MemoryReturn.h"
 
 #include "host/cimxml/Message.h"
+#include "tools/serve/FreedMemory.h"
 
 #include <malloc.h>
 
@@ -13,10 +14,6 @@ namespace Tools {
 namespace {
 
 using Host::CimXml::Response;
-
-// The objects of an answer of this size take forty megabytes. Mapping them again takes a small part
-// of the time that the answer takes.
-constexpr std::size_t largeAnswer = 10'000;
 
 // In bytes; usual messages have a few hundred. The parsed message takes ten times as much and more.
 constexpr std::size_t largeMessage = std::size_t{64} << 10;

@@ -217,7 +217,8 @@ TEST_F(ResourceTest, MediaTypesHaveTheWeightThatTheRequestGivesThem)
     EXPECT_EQ(weight("text/x-stub;version=0.0.1,text/plain"), 0);
     EXPECT_EQ(weight("text/x-stub;version=0.0.1,text/x-stub;version=1.0.0;q=0.75"), 0.75);
     EXPECT_EQ(weight("*/*"), 0);
-    EXPECT_EQ(weight("text/x-stub;q=x"), 0);
+    for (const std::string malformed : {"x", "", "nan", "inf", "2", "-1"})
+        EXPECT_EQ(weight("text/x-stub;q=" + malformed), 0) << malformed;
     EXPECT_EQ(weight(",,;,="), 0);
     EXPECT_EQ(weight(""), 0);
     EXPECT_EQ(weightOf({"GET", "/", "HTTP/1.1",
