@@ -31,8 +31,8 @@ void addHarvest(Exposition& exposition, const Harvest& harvest)
         exposition.add(Labels().add("kind", kind),
             static_cast<double>(std::ranges::count(harvest.sensors, kind, &Sensor::kind)));
     exposition.begin(sources);
-    for (const SourceState& source : harvest.sources)
-        exposition.add(Labels().add("source", source.name), source.isUp ? 1 : 0);
+    for (const auto& [source, isUp] : harvest.sources)
+        exposition.add(Labels().add("source", source), isUp ? 1 : 0);
     exposition.begin(build);
     exposition.add(Labels().add("version", SENSOR_PROFILE_VERSION), 1);
 }

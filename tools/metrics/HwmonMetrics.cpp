@@ -11,8 +11,10 @@
 #include <fstream>
 #include <map>
 #include <optional>
-#include <set>
+#include <string>
 #include <system_error>
+#include <utility>
+#include <vector>
 
 namespace Tools {
 
@@ -22,10 +24,10 @@ namespace Files = std::filesystem;
 
 constexpr const char* hwmonFolder = "/sys/class/hwmon";
 
-// The factor between the kernel's unit of an attribute and that of its series. The series differ in
-// their last digit from those of the exporter if all factors are computed alike.
+// The kernel's unit of an attribute, as a part of the unit of its series.
 enum class Scale { one, milli, micro };
 
+// Multiplies and divides where the exporter does, since that decides on the last digit.
 double scaled(double number, Scale scale)
 {
     switch (scale) {

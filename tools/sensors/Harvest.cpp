@@ -14,6 +14,7 @@
 #include "tools/sensors/ChipDevices.h"
 
 #include <exception>
+#include <map>
 #include <string_view>
 #include <unordered_set>
 
@@ -72,15 +73,17 @@ bool isUp(const Vorn::SourceEntry& entry, const Identifiers& harvested)
     }
 }
 
-std::vector<SourceState> statesOfSources(const Sensors& sensors)
+std::map<std::string, bool> statesOfSources(const Sensors& sensors)
 {
     Identifiers harvested;
     for (const Sensor& sensor : sensors)
         harvested.insert(sensor.deviceId);
-    std::vector<SourceState> states;
-    for (const Vorn::SourceEntry& entry : SourceOptions::sources())
-        states.push_back(
-            {entry.scheme == "hwmon" ? entry.scheme : entry.text, isUp(entry, harvested)});
+    std::map<std::string, bool> states;
+    for (const Vorn::SourceEntry& entry : SourceOptions::sources()) {
+        const std::string& name = entry.scheme == "hwmon" ? entry.scheme : entry.text;
+        bool& areAllUp = states.try_emplace(name, true).first->second;
+        areAllUp = areAllUp && isUp(entry, harvested);
+    }
     return states;
 }
 

@@ -5,8 +5,8 @@
 #include "tools/sensors/SensorList.h"
 
 #include <chrono>
+#include <map>
 #include <string>
-#include <vector>
 
 namespace Host {
 class Manager;
@@ -14,15 +14,12 @@ class Manager;
 
 namespace Tools {
 
-struct SourceState {
-    std::string name; // such as "hwmon" or "model:FILE"
-    bool isUp;        // whether it could be read and all its sensors are in the harvest
-};
-
 // The sensors of the machine at one time, without their instances, in the provider's order.
 struct Harvest {
     Sensors sensors;
-    std::vector<SourceState> sources; // those of VORN_INSTRUMENTATION
+    // The sources of VORN_INSTRUMENTATION, such as "hwmon" or "model:FILE", and whether each could
+    // be read and all its sensors are here.
+    std::map<std::string, bool> sources;
     std::chrono::duration<double> duration{};
 };
 
