@@ -41,6 +41,18 @@ void appendUtf8(std::string& out, char32_t code)
     utf8::append(isCodePoint(code) ? code : replacementCharacter, out);
 }
 
+bool isUnprintable(char32_t character)
+{
+    const auto isWithin = [&](char32_t first, char32_t last) {
+        return character >= first && character <= last;
+    };
+    const bool isControl = character < 0x20 || isWithin(0x7F, 0x9F);
+    const bool isSeparator = character == 0x2028 || character == 0x2029;
+    const bool isBidirectional = character == 0x061C || isWithin(0x200E, 0x200F) ||
+                                 isWithin(0x202A, 0x202E) || isWithin(0x2066, 0x2069);
+    return isControl || isSeparator || isBidirectional;
+}
+
 std::string toValidUtf8(std::string_view text)
 {
     std::string valid;

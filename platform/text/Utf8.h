@@ -26,6 +26,10 @@ Character firstCharacter(std::string_view text);
 // Appends a code point; U+FFFD for a number that is none.
 void appendUtf8(std::string& out, char32_t code);
 
+// Returns whether the character controls a terminal or the order of its neighbours: controls, line
+// and paragraph separators, bidirectional controls.
+bool isUnprintable(char32_t character);
+
 // Returns the text with U+FFFD for each byte that belongs to no character.
 std::string toValidUtf8(std::string_view text);
 

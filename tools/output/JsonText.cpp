@@ -56,7 +56,7 @@ void appendString(std::string& json, std::string_view text)
         const Text::Character character = Text::firstCharacter(text);
         if (const char letter = shortEscape(character.code))
             json.append({'\\', letter});
-        else if (isUnprintable(character.code))
+        else if (Text::isUnprintable(character.code))
             appendEscape(json, character.code);
         else if (character.isValid)
             json += text.substr(0, character.size);
@@ -74,7 +74,7 @@ std::string escapeUnprintable(std::string_view json)
     result.reserve(json.size());
     while (!json.empty()) {
         const Text::Character character = Text::firstCharacter(json);
-        if (character.code <= lastOfAscii || !isUnprintable(character.code))
+        if (character.code <= lastOfAscii || !Text::isUnprintable(character.code))
             result += json.substr(0, character.size);
         else
             appendEscape(result, character.code);

@@ -46,18 +46,6 @@ std::string escapeOf(char32_t character)
 
 } // namespace
 
-bool isUnprintable(char32_t character)
-{
-    const auto isWithin = [&](char32_t first, char32_t last) {
-        return character >= first && character <= last;
-    };
-    const bool isControl = character < 0x20 || isWithin(0x7F, 0x9F);
-    const bool isSeparator = character == 0x2028 || character == 0x2029;
-    const bool isBidirectional = character == 0x061C || isWithin(0x200E, 0x200F) ||
-                                 isWithin(0x202A, 0x202E) || isWithin(0x2066, 0x2069);
-    return isControl || isSeparator || isBidirectional;
-}
-
 std::string printable(std::string_view text, bool isUtf8)
 {
     if (isPlain(text))
@@ -67,7 +55,7 @@ std::string printable(std::string_view text, bool isUtf8)
     while (!text.empty()) {
         const Text::Character character = Text::firstCharacter(text);
         const bool isForeign = !isUtf8 && character.code > lastOfAscii;
-        if (isUnprintable(character.code) || (isForeign && character.code != degreeSign))
+        if (Text::isUnprintable(character.code) || (isForeign && character.code != degreeSign))
             result += escapeOf(character.code);
         else if (!character.isValid)
             Text::appendUtf8(result, Text::replacementCharacter);

@@ -10,10 +10,6 @@
 
 namespace Tools {
 
-// Returns whether the character controls the terminal or the order of its neighbours: controls,
-// line and paragraph separators, bidirectional controls.
-bool isUnprintable(char32_t character);
-
 // Returns the number of a terminal's columns that the character occupies: 0, 1 or 2.
 std::size_t widthOf(char32_t character);
 
