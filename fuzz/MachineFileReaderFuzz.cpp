@@ -14,7 +14,7 @@
 
 namespace {
 
-std::optional<std::vector<Vorn::MachineFileNode>> tryRead(std::string_view text)
+std::optional<Vorn::MachineFile> tryRead(std::string_view text)
 {
     try {
         return Vorn::readMachineFile(text);
@@ -30,13 +30,13 @@ bool isSame(const Vorn::MachineFileNode& left, const Vorn::MachineFileNode& righ
            left.values == right.values;
 }
 
-void requireRoundTrip(const std::vector<Vorn::MachineFileNode>& nodes)
+void requireRoundTrip(const Vorn::MachineFile& file)
 {
-    const auto again = tryRead(Vorn::writeMachineFile(nodes));
-    if (!again || again->size() != nodes.size())
+    const auto again = tryRead(Vorn::writeMachineFile(file));
+    if (!again || again->nodes.size() != file.nodes.size() || again->renewal != file.renewal)
         std::abort();
-    for (std::size_t at = 0; at < nodes.size(); ++at)
-        if (!isSame(nodes[at], (*again)[at]))
+    for (std::size_t at = 0; at < file.nodes.size(); ++at)
+        if (!isSame(file.nodes[at], again->nodes[at]))
             std::abort();
 }
 
@@ -46,7 +46,7 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
 
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size)
 {
-    if (const auto nodes = tryRead({reinterpret_cast<const char*>(data), size}))
-        requireRoundTrip(*nodes);
+    if (const auto file = tryRead({reinterpret_cast<const char*>(data), size}))
+        requireRoundTrip(*file);
     return 0;
 }

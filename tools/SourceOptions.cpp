@@ -2,12 +2,15 @@
 
 #include "tools/SourceOptions.h"
 
+#include "platform/instrumentation/Instrumentation.h"
+#include "platform/instrumentation/ipmi/IpmiSource.h"
 #include "platform/instrumentation/machinefile/MachineFileSource.h"
 #include "tools/cim/ProviderFile.h"
 
 #include <CLI/CLI.hpp>
 
 #include <algorithm>
+#include <cmath>
 #include <cstdlib>
 #include <filesystem>
 
@@ -40,7 +43,8 @@ void SourceOptions::selectMachine() const
 std::vector<Vorn::SourceEntry> SourceOptions::sources()
 {
     const char* const list = std::getenv("VORN_INSTRUMENTATION");
-    return Vorn::parseSourceList(list == nullptr || *list == '\0' ? "hwmon" : list);
+    return Vorn::parseSourceList(
+        list == nullptr || *list == '\0' ? Vorn::Instrumentation::defaultSources : list);
 }
 
 bool SourceOptions::readsHwmon()
@@ -48,6 +52,15 @@ bool SourceOptions::readsHwmon()
     const auto entries = sources();
     return std::any_of(entries.begin(), entries.end(),
         [](const Vorn::SourceEntry& entry) { return entry.scheme == "hwmon"; });
+}
+
+std::string SourceOptions::ageOfCollection()
+{
+    for (const Vorn::SourceEntry& entry : sources())
+        if (entry.scheme == "ipmi")
+            if (const auto age = Vorn::IpmiSource(entry.argument).age())
+                return "read " + std::to_string(std::lround(*age)) + " s ago";
+    return "";
 }
 
 ProviderFiles SourceOptions::providerFiles() const

@@ -38,6 +38,10 @@ public:
     // Returns whether the sensors are those of the kernel. REQUIRES: selectMachine() was called.
     static bool readsHwmon();
 
+    // Returns when the sensors of a management controller were read, such as "read 4 s ago"; an
+    // empty text where the machine has none.
+    static std::string ageOfCollection();
+
     // Throws std::runtime_error when no library is given and none is found.
     ProviderFiles providerFiles() const;
 

@@ -19,7 +19,10 @@ namespace Vorn {
 // Not thread-safe; any number of cursors may be in use at once.
 class Instrumentation {
 public:
-    // Opens the sources that VORN_INSTRUMENTATION names ("hwmon" when it is not set).
+    // The default of VORN_INSTRUMENTATION.
+    static constexpr const char* defaultSources = "hwmon,ipmi";
+
+    // Opens the sources that VORN_INSTRUMENTATION names.
     Instrumentation();
     ~Instrumentation();
     Instrumentation(const Instrumentation&) = delete;

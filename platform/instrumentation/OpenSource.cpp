@@ -3,6 +3,7 @@
 #include "platform/instrumentation/OpenSource.h"
 
 #include "platform/instrumentation/hwmon/HwmonSource.h"
+#include "platform/instrumentation/ipmi/IpmiSource.h"
 #include "platform/instrumentation/machinefile/MachineFileSource.h"
 
 #include <stdexcept>
@@ -19,13 +20,15 @@ std::unique_ptr<Source> openSource(const SourceEntry& entry)
         throw std::runtime_error(
             "source \"" + entry.text + "\": hwmon takes no argument but parallel");
     }
+    if (entry.scheme == "ipmi")
+        return std::make_unique<IpmiSource>(entry.argument);
     if (entry.scheme == "model") {
         if (entry.argument.empty())
             throw std::runtime_error("source \"model\" names no file: write model:FILE");
         return std::make_unique<MachineFileSource>(entry.argument);
     }
     throw std::runtime_error(
-        "source \"" + entry.text + "\" is of an unknown kind (there are: hwmon, model)");
+        "source \"" + entry.text + "\" is of an unknown kind (there are: hwmon, ipmi, model)");
 }
 
 } // namespace Vorn

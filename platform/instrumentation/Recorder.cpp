@@ -50,15 +50,15 @@ std::string uniquePath(const std::string& path, std::set<std::string>& known)
 
 std::string recordMachineFile()
 {
-    std::vector<MachineFileNode> nodes;
+    MachineFile machine;
     std::set<std::string> paths;
     for (const NodeType type : {NodeType::Temperature, NodeType::Voltage, NodeType::Tachometer}) {
         Instrumentation cursor;
         for (cursor.selectNode(type); cursor; ++cursor)
-            nodes.push_back({type, uniquePath(cursor.getPathToNode(), paths),
+            machine.nodes.push_back({type, uniquePath(cursor.getPathToNode(), paths),
                 cursor.getNodeDescription(), cursor.getSensorType(), readingOf(cursor)});
     }
-    return writeMachineFile(nodes);
+    return writeMachineFile(machine);
 }
 
 } // namespace Vorn

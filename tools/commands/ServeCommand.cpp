@@ -150,7 +150,7 @@ public:
         logToStandardError();
         source_.selectMachine();
         // Slow chips do not delay each other, unless the environment names the sources.
-        ::setenv("VORN_INSTRUMENTATION", "hwmon:parallel", 0);
+        ::setenv("VORN_INSTRUMENTATION", "hwmon:parallel,ipmi", 0);
         const Signals signals; // before any thread starts
         const Protection protection(options_);
         if (options_.isCheck)

@@ -25,13 +25,13 @@ MachineFileCache& MachineFileCache::instance()
     return cache;
 }
 
-MachineFileCache::Nodes MachineFileCache::load(const std::string& path)
+MachineFileCache::Content MachineFileCache::load(const std::string& path)
 {
     try {
         const Outcome outcome = find(path);
-        if (outcome.nodes == nullptr)
+        if (outcome.content == nullptr)
             throw std::runtime_error(outcome.failure);
-        return outcome.nodes;
+        return outcome.content;
     } catch (const std::runtime_error& error) {
         throw std::runtime_error("model file " + path + ": " + error.what());
     }
@@ -56,8 +56,7 @@ MachineFileCache::Outcome MachineFileCache::read(const std::string& path)
 {
     const FileContent file = readRegularFile(path, maximumBytes);
     try {
-        return {file.stamp,
-            std::make_shared<const std::vector<MachineFileNode>>(readMachineFile(file.text)), {}};
+        return {file.stamp, std::make_shared<const MachineFile>(readMachineFile(file.text)), {}};
     } catch (const std::runtime_error& error) {
         return {file.stamp, nullptr, error.what()};
     }

@@ -3,34 +3,33 @@
 #pragma once
 
 #include "platform/instrumentation/FileStamp.h"
-#include "platform/instrumentation/machinefile/MachineFileNode.h"
+#include "platform/instrumentation/machinefile/MachineFile.h"
 
 #include <map>
 #include <memory>
 #include <mutex>
 #include <string>
-#include <vector>
 
 namespace Vorn {
 
-// Caches the nodes of model files until the files change. Thread-safe; files are read outside the
+// Caches the content of model files until the files change. Thread-safe; files are read outside the
 // lock.
 class MachineFileCache {
 public:
     // Returns the cache of this process.
     static MachineFileCache& instance();
 
-    using Nodes = std::shared_ptr<const std::vector<MachineFileNode>>;
+    using Content = std::shared_ptr<const MachineFile>;
 
-    // Returns the nodes that the file describes now. Throws std::runtime_error naming the file, the
-    // place in it and the reason.
-    Nodes load(const std::string& path);
+    // Returns what the file holds now. Throws std::runtime_error naming the file, the place in it
+    // and the reason.
+    Content load(const std::string& path);
 
 private:
-    // The result of reading a file: its nodes, or the reason why there are none.
+    // The result of reading a file: its content, or the reason why there is none.
     struct Outcome {
         FileStamp stamp;
-        Nodes nodes;
+        Content content;
         std::string failure;
     };
 

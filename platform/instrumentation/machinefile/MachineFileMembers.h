@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The members of a node in a model file, for the file's reader and its writer.
+// The members of a model file and of its nodes, for the file's reader and its writer.
 
 #pragma once
 
@@ -13,7 +13,11 @@
 
 namespace Vorn::MachineFileMember {
 
-inline constexpr std::string_view nodes = "nodes"; // the document's only member
+inline constexpr std::string_view nodes = "nodes"; // required in the document
+
+// The members of a document that is renewed.
+inline constexpr std::string_view period = "period";
+inline constexpr std::string_view time = "time";
 
 // The members that every node has.
 inline constexpr std::string_view type = "type";

@@ -247,19 +247,31 @@ void readMember(std::string_view name, const Json& value, const Place& place, Ma
         fail(place, "there is no such member");
 }
 
+// Throws unless the member is the first of its name.
+void requireFirst(
+    const Json::object_t& members, Json::object_t::const_iterator member, const Place& place)
+{
+    if (members.find(member->first) != member)
+        fail(place, "the member is there twice");
+}
+
+void requireMember(const Json::object_t& members, const Place& place, std::string_view name)
+{
+    if (members.count(std::string(name)) == 0)
+        fail(place, "member \"" + std::string(name) + "\" is missing");
+}
+
 MachineFileNode nodeOf(const Json& value, const Place& place)
 {
     MachineFileNode node;
     const auto& members = require<Json::object_t>(value, place, "an object");
     for (auto member = members.begin(); member != members.end(); ++member) {
         const Place memberPlace{&place, member->first};
-        if (members.find(member->first) != member) // the first of the name
-            fail(memberPlace, "the member is there twice");
+        requireFirst(members, member, memberPlace);
         readMember(member->first, member->second, memberPlace, node);
     }
     for (const std::string_view name : {Member::type, Member::path, Member::description})
-        if (members.count(std::string(name)) == 0)
-            fail(place, "member \"" + std::string(name) + "\" is missing");
+        requireMember(members, place, name);
     if (members.count(std::string(Member::sensorType)) == 0)
         node.sensorType = static_cast<unsigned>(node.type);
     Member::changeThousandths(node, keepingThousandths);
@@ -285,19 +297,33 @@ std::vector<MachineFileNode> nodesOf(const Json& value, const Place& place)
 
 } // namespace
 
-std::vector<MachineFileNode> readMachineFile(std::string_view text)
+MachineFile readMachineFile(std::string_view text)
 {
     const Json value = parsed(text);
     const Place document;
     const auto& members = require<Json::object_t>(value, document, "an object");
-    for (const auto& [name, member] : members)
-        if (name != Member::nodes)
-            fail({&document, name}, "there is no such member");
-    if (members.empty())
-        fail(document, "member \"nodes\" is missing");
-    if (members.size() > 1)
-        fail({&document, Member::nodes}, "the member is there twice");
-    return nodesOf(members.front().second, {&document, Member::nodes});
+    MachineFile file;
+    std::optional<double> period;
+    std::optional<double> time;
+    for (auto member = members.begin(); member != members.end(); ++member) {
+        const auto& [name, content] = *member;
+        const Place place{&document, name};
+        requireFirst(members, member, place);
+        if (name == Member::nodes)
+            file.nodes = nodesOf(content, place);
+        else if (name == Member::period)
+            read(content, place, period);
+        else if (name == Member::time)
+            read(content, place, time);
+        else
+            fail(place, "there is no such member");
+    }
+    requireMember(members, document, Member::nodes);
+    if (period.has_value() != time.has_value())
+        requireMember(members, document, period ? Member::time : Member::period);
+    if (period)
+        file.renewal = {*period, *time};
+    return file;
 }
 
 } // namespace Vorn

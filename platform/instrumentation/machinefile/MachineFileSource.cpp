@@ -7,15 +7,15 @@
 namespace Vorn {
 
 MachineFileSource::MachineFileSource(const std::string& path)
-    : nodes_(MachineFileCache::instance().load(path))
+    : file_(MachineFileCache::instance().load(path))
 {
 }
 
 std::vector<Node> MachineFileSource::nodes(NodeLexicon::NodeType type)
 {
     std::vector<Node> found;
-    for (std::size_t index = 0; index < nodes_->size(); ++index) {
-        const MachineFileNode& node = (*nodes_)[index];
+    for (std::size_t index = 0; index < file_->nodes.size(); ++index) {
+        const MachineFileNode& node = file_->nodes[index];
         if (node.type == type)
             found.push_back({node.path, node.description, node.sensorType, index});
     }
@@ -24,7 +24,7 @@ std::vector<Node> MachineFileSource::nodes(NodeLexicon::NodeType type)
 
 NodeReading MachineFileSource::read(const Node& node)
 {
-    return nodes_->at(node.token).values;
+    return file_->nodes.at(node.token).values;
 }
 
 void checkMachineFile(const std::string& path)

@@ -3,7 +3,7 @@
 #pragma once
 
 #include "platform/instrumentation/Source.h"
-#include "platform/instrumentation/machinefile/MachineFileNode.h"
+#include "platform/instrumentation/machinefile/MachineFile.h"
 
 #include <memory>
 #include <string>
@@ -20,8 +20,11 @@ public:
     std::vector<Node> nodes(NodeLexicon::NodeType type) override;
     NodeReading read(const Node& node) override;
 
+    // Returns when the file was written, if a process renews it.
+    const std::optional<Renewal>& renewal() const { return file_->renewal; }
+
 private:
-    std::shared_ptr<const std::vector<MachineFileNode>> nodes_;
+    std::shared_ptr<const MachineFile> file_;
 };
 
 // Returns when the file can be served. Throws as the constructor of MachineFileSource does.

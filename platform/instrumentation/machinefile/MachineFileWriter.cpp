@@ -57,13 +57,22 @@ nlohmann::ordered_json toJson(MachineFileNode node)
     return json;
 }
 
+std::string member(std::string_view name, double value)
+{
+    return '"' + std::string(name) + "\": " + nlohmann::ordered_json(value).dump() + ", ";
+}
+
 } // namespace
 
-std::string writeMachineFile(const std::vector<MachineFileNode>& nodes)
+std::string writeMachineFile(const MachineFile& file)
 {
-    std::string text = "{ \"nodes\": [";
-    for (const MachineFileNode& node : nodes)
-        text += (&node == nodes.data() ? "\n  " : ",\n  ") + toJson(node).dump();
+    std::string text = "{ ";
+    if (file.renewal)
+        text +=
+            member(Member::period, file.renewal->period) + member(Member::time, file.renewal->time);
+    text += "\"nodes\": [";
+    for (const MachineFileNode& node : file.nodes)
+        text += (&node == file.nodes.data() ? "\n  " : ",\n  ") + toJson(node).dump();
     return text + "\n] }\n";
 }
 

@@ -47,7 +47,7 @@ TEST(MachineFilePrecisionTest, EveryWholeNumberOfMillivoltsIsPublishedAsItIs)
 {
     for (int number = -20'000; number <= 20'000; number += 7) {
         const auto node =
-            readMachineFile(fileWith("voltage", R"("reading":)" + decimal(number))).at(0);
+            readMachineFile(fileWith("voltage", R"("reading":)" + decimal(number))).nodes.at(0);
         ASSERT_EQ(published(node, &NodeReading::reading), number);
     }
 }
@@ -57,7 +57,7 @@ TEST(MachineFilePrecisionTest, LimitsAreAsPreciseAsReadings)
     const auto node = readMachineFile(fileWith("voltage", R"("reading":12.6,"lowerFatal":12.6,
         "lowerCritical":12.6,"lowerNonCritical":12.6,"upperNonCritical":12.6,"upperCritical":12.6,
         "upperFatal":12.6)"))
-                          .at(0);
+                          .nodes.at(0);
     for (const auto field : {&NodeReading::reading, &NodeReading::lowerFatal,
              &NodeReading::lowerCritical, &NodeReading::lowerNonCritical,
              &NodeReading::upperNonCritical, &NodeReading::upperCritical, &NodeReading::upperFatal})
@@ -67,12 +67,13 @@ TEST(MachineFilePrecisionTest, LimitsAreAsPreciseAsReadings)
 TEST(MachineFilePrecisionTest, OtherNumbersStayAsTheyAre)
 {
     EXPECT_EQ(
-        readMachineFile(fileWith("temperature", R"("reading":3.3)")).at(0).values.reading, 3.3);
+        readMachineFile(fileWith("temperature", R"("reading":3.3)")).nodes.at(0).values.reading,
+        3.3);
     EXPECT_EQ(readMachineFile(fileWith("voltage", R"("reading":3.3,"sensorType":7)"))
-                  .at(0)
+                  .nodes.at(0)
                   .values.reading,
         3.3);
-    const auto node = readMachineFile(fileWith("voltage", R"("reading":1.2345)")).at(0);
+    const auto node = readMachineFile(fileWith("voltage", R"("reading":1.2345)")).nodes.at(0);
     EXPECT_EQ(node.values.reading, 1.2345);
     EXPECT_EQ(published(node, &NodeReading::reading), 1234);
 }
@@ -81,10 +82,10 @@ TEST(MachineFilePrecisionTest, RecordingHasTheNumbersOfTheFile)
 {
     for (const char* const number : {"12.6", "1.2", "-3.3", "1.2345", "0.0", "-0.0", "1e+300"}) {
         const std::string member = std::string(R"("reading":)") + number;
-        const auto nodes = readMachineFile(fileWith("voltage", member));
-        const std::string recording = Vorn::writeMachineFile(nodes);
+        const auto file = readMachineFile(fileWith("voltage", member));
+        const std::string recording = Vorn::writeMachineFile(file);
         EXPECT_NE(recording.find(member + "}"), std::string::npos) << recording;
-        EXPECT_EQ(readMachineFile(recording).at(0).values, nodes.at(0).values);
+        EXPECT_EQ(readMachineFile(recording).nodes.at(0).values, file.nodes.at(0).values);
     }
 }
 

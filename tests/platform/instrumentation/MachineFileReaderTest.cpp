@@ -24,8 +24,12 @@ using testing::IsEmpty;
 using testing::SizeIs;
 using testing::StartsWith;
 using Vorn::MachineFileNode;
-using Vorn::readMachineFile;
 using Vorn::NodeLexicon::NodeType;
+
+std::vector<MachineFileNode> readMachineFile(std::string_view text)
+{
+    return Vorn::readMachineFile(text).nodes;
+}
 
 // Returns a document with one node, which has the required and the given members.
 std::string nodeWith(const std::string& members)

@@ -17,7 +17,7 @@ TEST(OpenSourceTest, NamesAnUnknownKindOfSource)
 {
     const EnvironmentVariable environment("VORN_INSTRUMENTATION", "hwmon,ipmb:3");
     EXPECT_THAT(errorOf([] { Instrumentation cursor; }),
-        testing::AllOf(HasSubstr("\"ipmb:3\""), HasSubstr("hwmon, model")));
+        testing::AllOf(HasSubstr("\"ipmb:3\""), HasSubstr("hwmon, ipmi, model")));
 }
 
 TEST(OpenSourceTest, NamesWrongArguments)

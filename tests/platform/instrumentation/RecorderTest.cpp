@@ -21,7 +21,7 @@ TEST(RecorderTest, WalksTemperaturesThenVoltagesThenTachometers)
 {
     const ScriptedMachine machine({{NodeType::Tachometer, "/f", "", {}},
         {NodeType::Voltage, "/v", "", {}}, {NodeType::Temperature, "/t", "", {}}});
-    const auto nodes = Vorn::readMachineFile(recordMachineFile());
+    const auto nodes = Vorn::readMachineFile(recordMachineFile()).nodes;
     ASSERT_THAT(nodes, SizeIs(3));
     EXPECT_EQ(nodes[0].path, "/t");
     EXPECT_EQ(nodes[1].path, "/v");
@@ -34,7 +34,7 @@ TEST(RecorderTest, LeavesOutNumbersThatAreNotFinite)
         {.reading = std::numeric_limits<double>::quiet_NaN(),
             .lowerCritical = 1.5,
             .upperCritical = std::numeric_limits<double>::infinity()}}});
-    const auto nodes = Vorn::readMachineFile(recordMachineFile());
+    const auto nodes = Vorn::readMachineFile(recordMachineFile()).nodes;
     EXPECT_FALSE(nodes.at(0).values.reading);
     EXPECT_FALSE(nodes.at(0).values.upperCritical);
     EXPECT_EQ(nodes.at(0).values.lowerCritical, 1.5);
@@ -44,7 +44,7 @@ TEST(RecorderTest, MakesPathsUnique)
 {
     const ScriptedMachine machine({{NodeType::Voltage, "/v", "1", {}},
         {NodeType::Voltage, "/v", "2", {}}, {NodeType::Tachometer, "/v", "3", {}}});
-    const auto nodes = Vorn::readMachineFile(recordMachineFile());
+    const auto nodes = Vorn::readMachineFile(recordMachineFile()).nodes;
     ASSERT_THAT(nodes, SizeIs(3));
     EXPECT_EQ(nodes[0].path, "/v");
     EXPECT_EQ(nodes[1].path, "/v#2");
@@ -54,7 +54,7 @@ TEST(RecorderTest, MakesPathsUnique)
 TEST(RecorderTest, MakesTextsValid)
 {
     const ScriptedMachine machine({{NodeType::Voltage, "/\xFF", "a\xFE", {}}});
-    const auto nodes = Vorn::readMachineFile(recordMachineFile());
+    const auto nodes = Vorn::readMachineFile(recordMachineFile()).nodes;
     EXPECT_EQ(nodes.at(0).path, "/\xEF\xBF\xBD");
     EXPECT_EQ(nodes.at(0).description, "a\xEF\xBF\xBD");
 }
