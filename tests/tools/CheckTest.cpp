@@ -110,6 +110,19 @@ TEST_F(CheckTest, WhatIsMissingFromTheExpectedMachineIsCritical)
     EXPECT_THAT(missing({"cpu0"}).out, HasSubstr("chip cpu0 is missing, no sensor matches"));
 }
 
+TEST_F(CheckTest, ASensorWithoutContactIsAProblemWhereItIsExpected)
+{
+    constexpr const char* slot = R"({ "type": "temperature", "path": "/ipmi/20/0/1",
+                                      "description": "Slot 1", "status": )";
+    const std::string empty = model(slot + std::string("17 }"));
+    EXPECT_EQ(checkedFile(empty).out, "SENSORS OK - 1 sensor: 1 inactive.\n");
+    const std::string full = folder_.write(
+        "full.json", "{ \"nodes\": [" + std::string(slot) + "1, \"reading\": 20 } ] }");
+    EXPECT_EQ(run({"check", "--model", empty, "--expect", empty}).code, 0);
+    EXPECT_EQ(run({"check", "--model", empty, "--expect", full}).out,
+        "SENSORS CRITICAL - /ipmi/20/0/1 has no contact - 1 sensor: 1 inactive.\n");
+}
+
 TEST_F(CheckTest, ManyProblemsAreCounted)
 {
     const auto checkedWith = [&](int sensors) {

@@ -150,7 +150,7 @@ TEST_F(SensorTest, UnknownStateGivesWayToTheOperationalStatus)
     setText("CurrentState", "Unknown");
     EXPECT_EQ(seen().state.word, "Unknown");
     for (const auto& [status, word, urgency] : {std::tuple(5U, "Failing soon", Urgency::warning),
-             {8U, "Starting", Urgency::inactive}, {12U, "No contact", Urgency::lost},
+             {8U, "Starting", Urgency::inactive}, {12U, "No contact", Urgency::inactive},
              {13U, "Lost", Urgency::lost}, {15U, "Dormant", Urgency::inactive},
              {0U, "Unknown", Urgency::unknown}, {2U, "Unknown", Urgency::unknown}}) {
         setCodes("OperationalStatus", {status});

@@ -8,6 +8,7 @@
 
 #include <algorithm>
 #include <array>
+#include <map>
 #include <set>
 
 namespace Tools {
@@ -156,15 +157,21 @@ void addSensors(Report& report, const Sensors& sensors, const Overrides& overrid
 
 void addMissing(Report& report, const Sensors& expected, const Sensors& present)
 {
+    const auto isThere = [](const Sensor& sensor) {
+        return sensor.state.word != noContactState.word;
+    };
     std::set<std::string> chips;
-    std::set<std::string> paths;
+    std::map<std::string, bool> paths; // and whether the sensors are there
     for (const Sensor& sensor : present) {
         chips.insert(sensor.chip);
-        paths.insert(sensor.path);
+        paths[sensor.path] = isThere(sensor);
     }
     std::set<std::string> missingChips;
     for (const Sensor& sensor : expected) {
-        if (paths.contains(sensor.path))
+        const auto found = paths.find(sensor.path);
+        if (found != paths.end() && !found->second && isThere(sensor))
+            report.add(CheckStatus::critical, sensor.path + " has no contact");
+        if (found != paths.end())
             continue;
         if (chips.contains(sensor.chip))
             report.add(CheckStatus::critical, sensor.path + " is missing");

@@ -55,7 +55,8 @@ private:
 // the name.
 void addSensors(Report& report, const Sensors& sensors, const Overrides& overrides);
 
-// Adds the chips and sensors that are expected but missing, as critical problems.
+// Adds the chips and sensors that are expected but missing or without contact, as critical
+// problems.
 void addMissing(Report& report, const Sensors& expected, const Sensors& present);
 
 } // namespace Tools

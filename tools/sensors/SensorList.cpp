@@ -2,6 +2,7 @@
 
 #include "tools/sensors/SensorList.h"
 
+#include "platform/instrumentation/NodeStatus.h"
 #include "platform/instrumentation/machinefile/MachineFileSource.h"
 #include "tools/cim/ProviderClient.h"
 #include "tools/sensors/NaturalOrder.h"
@@ -80,6 +81,8 @@ Sensors sensorsInFile(const std::string& file)
             Sensor& sensor = sensors.emplace_back();
             sensor.setNames(node.description, node.path);
             sensor.kind = kind;
+            if (source.read(node).status == Vorn::NodeStatus::noContact)
+                sensor.state = noContactState;
         }
     sort(sensors);
     return sensors;

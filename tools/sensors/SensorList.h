@@ -29,8 +29,9 @@ Sensors sensorsOf(const std::vector<const Host::Instance*>& instances);
 // instances belong to the client's request. Throws as ProviderClient does.
 Sensors readSensors(ProviderClient& provider, bool isWhole);
 
-// Returns the sensors that a model file describes, with their names and kinds only. Throws
-// std::runtime_error with the file, the place in it and the reason.
+// Returns the sensors that a model file describes, with their names and kinds only, and the state
+// of those without contact. Throws std::runtime_error with the file, the place in it and the
+// reason.
 Sensors sensorsInFile(const std::string& file);
 
 // Returns a sentence such as "78 sensors: 68 normal, 8 warning, 2 lost."

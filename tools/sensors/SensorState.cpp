@@ -32,7 +32,7 @@ constexpr std::array stateRows = {
     StateRow{"", 8, {"Starting", Urgency::inactive}},
     StateRow{"", 9, {"Stopping", Urgency::inactive}},
     StateRow{"", 10, {"Stopped", Urgency::inactive}},
-    StateRow{"", 12, {"No contact", Urgency::lost}},
+    StateRow{"", 12, noContactState},
     StateRow{"", 13, {"Lost", Urgency::lost}},
     StateRow{"", 15, {"Dormant", Urgency::inactive}},
 };

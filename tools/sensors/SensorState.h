@@ -18,6 +18,10 @@ struct SensorState {
     Urgency urgency = Urgency::unknown;
 };
 
+// The state of a sensor that has not been there since its controller is being read: an empty slot,
+// as a rule.
+inline constexpr SensorState noContactState = {"No contact", Urgency::inactive};
+
 // Returns the state with that CurrentState; where this is empty or "Unknown", the one with a code
 // of OperationalStatus. Returns the state "Unknown" for all others.
 SensorState stateOf(std::string_view currentState, std::span<const unsigned> statuses);
