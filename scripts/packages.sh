@@ -18,6 +18,7 @@ check_packages=(
   libbenchmark-dev libgmock-dev libgtest-dev
   binutils lm-sensors locales python3-jsonschema util-linux
   openssl sblim-wbemcli tmux
+  freeipmi-tools ipmitool libopenipmi-dev openipmi
   prometheus prometheus-alertmanager prometheus-node-exporter victoria-metrics
   python3-prometheus-client python3-yaml
   debootstrap dpkg-dev file iproute2 jq lintian man-db mandoc rpm rpmlint shellcheck systemd valgrind

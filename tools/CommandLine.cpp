@@ -50,6 +50,7 @@ Commands addCommands(CLI::App& tool)
     commands.push_back(makeWatchCommand(tool));
     commands.push_back(makeCheckCommand(tool));
     commands.push_back(makeRecordCommand(tool));
+    commands.push_back(makeCollectCommand(tool));
     commands.push_back(makeMetricsCommand(tool));
     commands.push_back(makeServeCommand(tool));
     return commands;

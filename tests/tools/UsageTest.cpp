@@ -23,7 +23,8 @@ TEST(UsageTest, HelpGoesToStandardOutput)
 
 TEST(UsageTest, EveryCommandHasItsHelp)
 {
-    for (const char* const command : {"list", "get", "walk", "watch", "check", "record", "serve"}) {
+    for (const char* const command :
+        {"list", "get", "walk", "watch", "check", "record", "collect", "serve"}) {
         const Ended ended = run({command, "--help"});
         EXPECT_EQ(ended.code, 0);
         EXPECT_THAT(ended.out, HasSubstr(std::string("sensorctl ") + command));
@@ -32,11 +33,17 @@ TEST(UsageTest, EveryCommandHasItsHelp)
 
 TEST(UsageTest, HelpFitsIntoEightyColumns)
 {
-    for (const std::vector<std::string>& arguments : std::vector<std::vector<std::string>>{
-             {"--help"}, {"list", "--help"}, {"get", "--help"}, {"walk", "--help"},
-             {"watch", "--help"}, {"check", "--help"}, {"record", "--help"}, {"serve", "--help"}})
+    for (const std::vector<std::string>& arguments :
+        std::vector<std::vector<std::string>>{{"--help"}, {"list", "--help"}, {"get", "--help"},
+            {"walk", "--help"}, {"watch", "--help"}, {"check", "--help"}, {"record", "--help"},
+            {"collect", "--help"}, {"serve", "--help"}})
         for (const std::string& line : linesOf(run(arguments).out))
             EXPECT_LE(line.size(), 80U) << line;
+}
+
+TEST(UsageTest, HelpOfCollectFitsIntoTwentyFourLines)
+{
+    EXPECT_LE(linesOf(run({"collect", "--help"}).out).size(), 24U);
 }
 
 TEST(UsageTest, VersionNamesTheToolAndTheInterface)
@@ -52,7 +59,8 @@ TEST(UsageTest, WrongUsageIsSaidAndEndsWithTwo)
         std::vector<std::vector<std::string>>{{}, {"frobnicate"}, {"list", "--kind", "humidity"},
             {"watch", "--interval", "0"}, {"list", "--csv", "--json"}, {"list", "--cim", "--flat"},
             {"list", "--frobnicate"}, {"list", "--model"}, {"list", "--color", "blue"}, {"get"},
-            {"walk", "one", "two"}, {"walk", "--json"}, {"record", "extra"}}) {
+            {"walk", "one", "two"}, {"walk", "--json"}, {"record", "extra"},
+            {"collect", "--interval", "0"}, {"collect", "--workaround", "none"}}) {
         const Ended ended = run(arguments);
         EXPECT_EQ(ended.code, 2) << testing::PrintToString(arguments);
         EXPECT_EQ(ended.out, "");

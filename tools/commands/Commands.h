@@ -16,6 +16,7 @@ std::unique_ptr<Command> makeWalkCommand(CLI::App& tool);
 std::unique_ptr<Command> makeWatchCommand(CLI::App& tool);
 std::unique_ptr<Command> makeCheckCommand(CLI::App& tool);
 std::unique_ptr<Command> makeRecordCommand(CLI::App& tool);
+std::unique_ptr<Command> makeCollectCommand(CLI::App& tool);
 std::unique_ptr<Command> makeMetricsCommand(CLI::App& tool);
 std::unique_ptr<Command> makeServeCommand(CLI::App& tool);
 

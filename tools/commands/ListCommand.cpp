@@ -118,6 +118,10 @@ private:
         if (sensors.empty())
             return;
         const bool isGrouped = display_.form() == Form::table;
+        const std::string age = isGrouped ? SourceOptions::ageOfCollection() : "";
+        for (Sensor& sensor : sensors)
+            if (sensor.chip == "ipmi")
+                sensor.device = age;
         const TextStyle style = display_.style();
         out.write(sensorTable(sensors, isGrouped ? Grouping::byChip : Grouping::none, style));
         if (isGrouped)

@@ -150,7 +150,8 @@ void Sensor::setNames(std::string_view itsLabel, std::string_view itsPath)
     constexpr std::string_view hwmon = "/hwmon/";
     std::string_view rest = itsPath;
     rest.remove_prefix(rest.starts_with(hwmon) ? hwmon.size() : rest.starts_with('/') ? 1 : 0);
-    const auto slash = rest.rfind('/');
+    // The rest of the path of a management controller's sensor is an address in several parts.
+    const auto slash = rest.starts_with("ipmi/") ? rest.find('/') : rest.rfind('/');
     chip = slash == std::string_view::npos ? "/" : rest.substr(0, slash);
     feature = slash == std::string_view::npos ? rest : rest.substr(slash + 1);
 }

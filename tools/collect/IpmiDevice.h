@@ -1,0 +1,31 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#pragma once
+
+#include "tools/collect/Transport.h"
+
+namespace Ipmi {
+
+inline constexpr const char* devicePath = "/dev/ipmi0";
+
+// The kernel's interface to the BMC of this machine (linux/ipmi.h), which also bridges commands to
+// satellites. Used by one thread.
+class IpmiDevice final : public Transport {
+public:
+    // Throws std::system_error naming the device.
+    IpmiDevice();
+    ~IpmiDevice() override;
+    IpmiDevice(const IpmiDevice&) = delete;
+    IpmiDevice& operator=(const IpmiDevice&) = delete;
+
+    Bytes send(const Command& command, std::chrono::milliseconds timeout) override;
+
+private:
+    bool submit(const Command& command, std::chrono::milliseconds timeout);
+    Bytes receive();
+
+    int file_;
+    long lastMessage_ = 0; // its number distinguishes an answer from late ones
+};
+
+} // namespace Ipmi
