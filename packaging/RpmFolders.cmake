@@ -8,4 +8,5 @@ file(REMOVE_RECURSE "${provider}/usr/lib")
 
 set(tool "${CPACK_TEMPORARY_DIRECTORY}/tool")
 file(RENAME "${tool}/lib/systemd" "${tool}/usr/lib/systemd")
+file(RENAME "${tool}/lib/udev" "${tool}/usr/lib/udev")
 file(REMOVE_RECURSE "${tool}/lib")

@@ -149,8 +149,8 @@ const std::string meaninglessStatus = "has a status that means nothing";
 const std::map<unsigned, std::string> rowsOfStatuses = {{0, "has no status"},
     {1, "is within its limits"}, {2, "starts"}, {3, "starts"}, {8, "is dormant"},
     {9, meaninglessStatus}, {10, "starts"}, {12, "is offline"}, {13, "is faulty"},
-    {16, "is switched off"}, {17, "has no contact"}, {20, "will fail soon"}, {21, "is in an alarm"},
-    {22, "reached a lower or upper limit of the first"},
+    {16, "is switched off"}, {17, "has not been there"}, {20, "will fail soon"},
+    {21, "is in an alarm"}, {22, "reached a lower or upper limit of the first"},
     {23, "reached a lower or upper limit of the first"}, {24, "is beyond a limit"},
     {25, "reached a limit of the second"}, {26, "reached a limit of the second"}};
 

@@ -97,6 +97,8 @@ TEST(RpmTest, HasTheFoldersOfRpmDistributions)
             Not(Contains(StartsWith("/usr/lib/")))));
     EXPECT_THAT(query(tool, "--list"),
         AllOf(Contains("/usr/lib/systemd/system/sensor-profile.service"),
+            Contains("/usr/lib/systemd/system/sensor-profile-collect.service"),
+            Contains("/usr/lib/udev/rules.d/60-sensor-profile-collect.rules"),
             Contains("/usr/lib/sysusers.d/sensor-profile.conf"),
             Contains("/usr/share/man/man1/sensorctl.1.gz"), Not(Contains(StartsWith("/lib")))));
     EXPECT_THAT(query(tool, "--configfiles"), ElementsAre("/" + settings));
@@ -318,7 +320,8 @@ TEST_F(RpmRootTest, UpgradeKeepsSettingsAndRestartsTheService)
     EXPECT_EQ(contentOf(root_.path() / settings), changed);
     EXPECT_TRUE(isEnabled());
     EXPECT_THAT(callsOfSystemctl(),
-        ElementsAre("daemon-reload", "daemon-reload", "try-restart sensor-profile.service"));
+        ElementsAre("daemon-reload", "daemon-reload",
+            "try-restart sensor-profile.service sensor-profile-collect.service"));
     EXPECT_EQ(
         rpm("-q " + tool), tool + "-" SENSOR_PROFILE_VERSION "-2." SENSOR_PROFILE_PROCESSOR "\n");
 }
@@ -332,7 +335,9 @@ TEST_F(RpmRootTest, RemovalLeavesChangedSettingsOnly)
     EXPECT_EQ(ended.code, 0);
     EXPECT_THAT(ended.err, HasSubstr("saved as /" + settings + ".rpmsave"));
     EXPECT_THAT(callsOfSystemctl(),
-        ElementsAre("--no-reload disable --now sensor-profile.service", "daemon-reload"));
+        ElementsAre("--no-reload disable --now sensor-profile.service",
+            "stop sensor-profile-collect.service",
+            "clean --what=runtime sensor-profile-collect.service", "daemon-reload"));
     EXPECT_THAT(newEntries(), ElementsAre("etc/sensor-profile", settings + ".rpmsave"));
 }
 
