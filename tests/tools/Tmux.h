@@ -67,7 +67,7 @@ private:
     // A frame that is being drawn differs from the next look at the terminal.
     bool isComplete(const std::string& seen) const
     {
-        std::this_thread::sleep_for(std::chrono::milliseconds(20));
+        std::this_thread::sleep_for(std::chrono::milliseconds(50));
         return screen() == seen;
     }
 

@@ -24,29 +24,46 @@ std::string command(const std::string& locale)
            " watch --interval 3600 --model " + data + "tables.json";
 }
 
-std::string section(const std::string& title, const std::string& screen)
-{
-    static const std::regex time("[0-9]{2}:[0-9]{2}:[0-9]{2}");
-    return "== " + title + "\n" + std::regex_replace(screen, time, "HH:MM:SS") + "\n";
-}
+// Collects the screens that a terminal shows.
+class Screens {
+public:
+    // Waits until the terminal shows the golden screen with that title.
+    void add(const std::string& title, const Tmux& terminal)
+    {
+        static const std::regex time("[0-9]{2}:[0-9]{2}:[0-9]{2}");
+        const std::string start = "== " + title + "\n";
+        std::string section;
+        terminal.waitForScreen([&](const std::string& screen) {
+            section = start + std::regex_replace(screen, time, "HH:MM:SS") + "\n";
+            return golden_.find(section) != std::string::npos;
+        });
+        seen_ += section;
+    }
+
+    const std::string& golden() const { return golden_; }
+    const std::string& seen() const { return seen_; }
+
+private:
+    std::string golden_ = contentOf(data + "screens.txt");
+    std::string seen_;
+};
 
 TEST(WatchScreenTest, IsTheGoldenOutput)
 {
+    Screens screens;
     const Tmux terminal(command("C.UTF-8"), 80, 24);
-    std::string seen = section("80 by 24", terminal.waitFor("\nq quit"));
+    screens.add("80 by 24", terminal);
     terminal.press("p");
-    seen += section("80 by 24, problems only", terminal.waitFor("problems only\n"));
+    screens.add("80 by 24, problems only", terminal);
     terminal.press("p");
     terminal.press("s");
     terminal.resize(120, 40);
-    seen += section("120 by 40, by state", terminal.waitForScreen([](const std::string& screen) {
-        return linesOf(screen).size() == 40 && screen.find("by state\n") != std::string::npos;
-    }));
+    screens.add("120 by 40, by state", terminal);
     const Tmux small(command("C"), 48, 12);
-    seen += section("48 by 12, without UTF-8", small.waitFor("\nq quit"));
-    EXPECT_EQ(seen, contentOf(data + "screens.txt"));
+    screens.add("48 by 12, without UTF-8", small);
+    EXPECT_EQ(screens.seen(), screens.golden());
     if (HasFailure())
-        std::ofstream(SENSOR_PROFILE_BINARY_DIR "/screens.txt") << seen;
+        std::ofstream(SENSOR_PROFILE_BINARY_DIR "/screens.txt") << screens.seen();
 }
 
 } // namespace
