@@ -44,10 +44,9 @@ const std::vector<std::string> providerFiles = {"lib/cmpi/libSensorProfileComput
 const std::vector<std::string> toolFiles = {"bin/sensorctl", "etc/sensor-profile/serve.conf",
     "lib/systemd/system/sensor-profile-collect.service",
     "lib/systemd/system/sensor-profile.service", "lib/udev/rules.d/60-sensor-profile-collect.rules",
-    "share/bash-completion/completions/sensorctl",
-    "share/doc/sensor-profile/changelog.gz", "share/doc/sensor-profile/fleet.md",
-    "share/man/man1/sensorctl.1.gz", "share/sensor-profile/demo-model.json",
-    "share/sensor-profile/deploy/grafana/fleet.json",
+    "share/bash-completion/completions/sensorctl", "share/doc/sensor-profile/changelog.gz",
+    "share/doc/sensor-profile/fleet.md", "share/man/man1/sensorctl.1.gz",
+    "share/sensor-profile/demo-model.json", "share/sensor-profile/deploy/grafana/fleet.json",
     "share/sensor-profile/deploy/grafana/machine.json",
     "share/sensor-profile/deploy/prometheus/alertmanager.yml",
     "share/sensor-profile/deploy/prometheus/prometheus.yml",
@@ -56,8 +55,8 @@ const std::vector<std::string> toolFiles = {"bin/sensorctl", "etc/sensor-profile
     "share/sensor-profile/deploy/prometheus/targets/example.yml",
     "share/sensor-profile/deploy/victoria-metrics/remote-write.yml",
     "share/sensor-profile/deploy/victoria-metrics/victoria-metrics.default",
-    "share/sensor-profile/host.mof",
-    "share/sensor-profile/interop.mof", "share/sensor-profile/sensorctl-list.schema.json"};
+    "share/sensor-profile/host.mof", "share/sensor-profile/interop.mof",
+    "share/sensor-profile/sensorctl-list.schema.json"};
 
 TEST(InstalledTest, AreTheProviderAndTheTool)
 {
