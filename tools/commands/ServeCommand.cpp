@@ -133,7 +133,7 @@ bool serve(Host::Http::Server& server, const Protection& protection, const Signa
 class ServeCommand : public Command {
 public:
     explicit ServeCommand(CLI::App& tool)
-        : Command(tool, "serve", "Answer CIM clients over HTTP, as an object manager does")
+        : Command(tool, "serve", "Answer CIM clients over HTTP, and Prometheus at /metrics")
     {
         options_.addTo(parser());
         source_.addModel(parser());
