@@ -17,17 +17,12 @@ check_packages=(
   clang clang-format clang-tidy libclang-rt-14-dev
   libbenchmark-dev libgmock-dev libgtest-dev
   binutils lm-sensors locales python3-jsonschema util-linux
-  openssl sblim-wbemcli tmux
+  icinga2 openssl sblim-wbemcli tmux
   freeipmi-tools ipmitool libopenipmi-dev openipmi
   prometheus prometheus-alertmanager prometheus-node-exporter victoria-metrics
   python3-prometheus-client python3-yaml
   debootstrap dpkg-dev file iproute2 jq lintian man-db mandoc rpm rpmlint shellcheck systemd valgrind
 )
-
-# Icinga 2's package starts a service, which a check should not bring to a developer's machine.
-if [ -n "${CI:-}" ]; then
-  check_packages+=(icinga2-bin)
-fi
 
 bench_packages=(
   "${build_packages[@]}"
@@ -36,7 +31,9 @@ bench_packages=(
 )
 
 # Packages whose programs are needed, but not the services that their installation starts.
-service_packages=(prometheus prometheus-alertmanager prometheus-node-exporter victoria-metrics)
+service_packages=(
+  icinga2 prometheus prometheus-alertmanager prometheus-node-exporter victoria-metrics
+)
 
 # Prints the packages of the list that are not installed, one per line.
 missing_packages() {

@@ -18,7 +18,7 @@ protected:
     void SetUp() override
     {
         if (!std::filesystem::exists("/usr/sbin/icinga2"))
-            cannotRun("there is no Icinga 2 (package icinga2-bin)");
+            cannotRun("there is no Icinga 2 (package icinga2)");
     }
 
     // Returns the objects of the manual page, with this build's tool and the machine of a test.
