@@ -11,6 +11,8 @@ import re
 
 import yaml
 
+from trial import credentials
+
 DEPLOY = pathlib.Path(__file__).resolve().parent.parent
 SECONDS = {"s": 1, "m": 60, "h": 3600, "d": 86400}
 DURATION = r"(\d+)([smhd])"
@@ -62,7 +64,7 @@ def prometheus(ports, interval, rule_interval):
     job = next(each for each in content["scrape_configs"] if each["job_name"] == "sensor-profile")
     # The machines are loopback addresses with one certificate; nothing answers names here.
     del job["dns_sd_configs"]
-    job["tls_config"]["server_name"] = "fleet.example.com"
+    job["tls_config"]["server_name"] = credentials.HOST
     content["scrape_configs"] = [job]
     return content
 
@@ -87,9 +89,32 @@ def alertmanager(ports, speed):
     return content
 
 
+def targets(racks, port):
+    """Returns the machines of the racks, for the discovery by files."""
+    return [
+        {
+            "labels": {"site": rack[0].site, "rack": rack[0].rack},
+            "targets": [f"{machine.address}:{port}" for machine in rack],
+        }
+        for rack in racks
+    ]
+
+
+def write_all(folder, options, ports, racks):
+    """Writes the files of Prometheus and Alertmanager into the folder."""
+    for file in ("recording.yml", "alerts.yml"):
+        write(folder / "rules" / file, rules(file, options.speed))
+    write(folder / "targets/fleet.yml", targets(racks, ports.machine))
+    write(
+        folder / "prometheus.yml", prometheus(ports, options.interval, options.rule_interval)
+    )
+    write(folder / "alertmanager.yml", alertmanager(ports, options.speed))
+
+
 def read(file):
     return yaml.safe_load((DEPLOY / file).read_text(encoding="utf-8"))
 
 
 def write(file, content):
+    file.parent.mkdir(exist_ok=True)
     file.write_text(yaml.safe_dump(content, allow_unicode=True), encoding="utf-8")

@@ -3,17 +3,14 @@
 """A fleet on loopback addresses: servers, Prometheus, Alertmanager and VictoriaMetrics."""
 
 import json
-import os
 import pathlib
-import secrets
-import subprocess
 import time
-import urllib.error
 import urllib.parse
 import urllib.request
 from dataclasses import dataclass
+from typing import NamedTuple
 
-from trial import configuration
+from trial import configuration, credentials
 from trial.incidents import SwitchedOff, incidents_of
 from trial.machine import Machine
 from trial.receiver import Receiver
@@ -23,27 +20,14 @@ RACKS = 5
 DAEMONS = ("prometheus", "prometheus-alertmanager", "victoria-metrics")
 
 
-@dataclass(frozen=True)
-class Ports:
-    """The ports of the programs, from the first one on. All machines have the last one."""
+class Ports(NamedTuple):
+    """The ports of the programs; all machines have the same one."""
 
     prometheus: int
-
-    @property
-    def alertmanager(self):
-        return self.prometheus + 1
-
-    @property
-    def victoria_metrics(self):
-        return self.prometheus + 2
-
-    @property
-    def receiver(self):
-        return self.prometheus + 3
-
-    @property
-    def machine(self):
-        return self.prometheus + 4
+    alertmanager: int
+    victoria_metrics: int
+    receiver: int
+    machine: int
 
 
 @dataclass(frozen=True)
@@ -69,19 +53,22 @@ class Fleet:
 
     def __init__(self, options, on_message):
         self.options = options
-        self.ports = Ports(options.first_port)
+        self.ports = Ports(*range(options.first_port, options.first_port + len(Ports._fields)))
         self.folder = options.folder
         # The servers, which do not stay root, read the models.
         self.folder.chmod(0o755)
-        for name in ("logs", "models", "rules", "targets"):
-            (self.folder / name).mkdir(parents=True, exist_ok=True)
+        for name in ("logs", "models"):
+            (self.folder / name).mkdir(exist_ok=True)
         self.racks = self._make_racks()
         self.machines = [machine for rack in self.racks for machine in rack]
         self.incidents = incidents_of(self.racks) if options.has_incidents else []
         self.services = Services(self.folder / "logs")
-        self._write_configuration()
-        self._make_secrets()
-        self.receiver = Receiver(self.ports.receiver, on_message)
+        configuration.write_all(self.folder, options, self.ports, self.racks)
+        credentials.make(self.folder)
+        try:
+            self.receiver = Receiver(self.ports.receiver, on_message)
+        except OSError as error:
+            raise Failure(f"port {self.ports.receiver}: {error.strerror}") from error
         self._begin = time.monotonic()
         self._moved = 0.0
 
@@ -152,7 +139,7 @@ class Fleet:
                     self._switch(machine, incident.is_on(self.minute))
 
     def check(self):
-        """Throws Failure where a process has ended by itself."""
+        """Raises Failure where a process has ended by itself."""
         if text := self.services.failure():
             raise Failure(text)
 
@@ -197,45 +184,6 @@ class Fleet:
             )
         return racks
 
-    def _write_configuration(self):
-        options = self.options
-        for file in ("recording.yml", "alerts.yml"):
-            configuration.write(
-                self.folder / "rules" / file, configuration.rules(file, options.speed)
-            )
-        configuration.write(
-            self.folder / "prometheus.yml",
-            configuration.prometheus(self.ports, options.interval, options.rule_interval),
-        )
-        configuration.write(
-            self.folder / "alertmanager.yml",
-            configuration.alertmanager(self.ports, options.speed),
-        )
-        targets = [
-            {
-                "labels": {"site": rack[0].site, "rack": rack[0].rack},
-                "targets": [f"{machine.address}:{self.ports.machine}" for machine in rack],
-            }
-            for rack in self.racks
-        ]
-        configuration.write(self.folder / "targets" / "fleet.yml", targets)
-
-    def _make_secrets(self):
-        """Makes a certificate for all machines, and the password of Prometheus."""
-        mask = os.umask(0o077)
-        password = secrets.token_urlsafe()
-        (self.folder / "password").write_text(password)
-        hashed = run("openssl", "passwd", "-6", "-stdin", input=password)
-        (self.folder / "passwords.pem").write_text(f"prometheus:{hashed}")
-        run(
-            *("openssl", "req", "-x509", "-newkey", "ec", "-pkeyopt", "ec_paramgen_curve:P-256"),
-            *("-nodes", "-days", "30", "-subj", "/CN=fleet.example.com"),
-            *("-addext", "subjectAltName=DNS:fleet.example.com"),
-            *("-keyout", self.folder / "key.pem", "-out", self.folder / "certificate.pem"),
-        )
-        (self.folder / "ca.pem").write_bytes((self.folder / "certificate.pem").read_bytes())
-        os.umask(mask)
-
     def _wait_for(self, port, path):
         end = time.monotonic() + 60
         while time.monotonic() < end:
@@ -250,12 +198,6 @@ class Fleet:
 
 def name_of(machine):
     return f"machine-{machine.number}"
-
-
-def run(*command, **arguments):
-    return subprocess.run(
-        command, check=True, text=True, stdout=subprocess.PIPE, stderr=subprocess.PIPE, **arguments
-    ).stdout
 
 
 def get_json(port, path):

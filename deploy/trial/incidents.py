@@ -89,9 +89,9 @@ def incidents_of(racks):
     with_fan = next(each for each in racks[0] if any(is_watched_fan(node) for node in each.nodes))
     heat = frozenset({"TemperatureCritical", "HeadroomGone"})
     return [
-        StoppedFan((with_fan,), 15, 50, frozenset({"FanStopped"})),
-        HeatWave(tuple(racks[1]), 10, 55, heat),
-        LostSensor((racks[2][0],), 20, 50, frozenset({"SensorLost"})),
-        LostChip((racks[3][0],), 25, 45, frozenset({"ChipGone"})),
-        SwitchedOff((racks[4][0],), 20, 50, frozenset({"MachineGone"})),
+        StoppedFan((with_fan,), 15, 55, frozenset({"FanStopped"})),
+        HeatWave(tuple(racks[1]), 10, 60, heat),
+        LostSensor((racks[2][0],), 20, 55, frozenset({"SensorLost"})),
+        LostChip((racks[3][0],), 25, 55, frozenset({"ChipGone"})),
+        SwitchedOff((racks[4][0],), 20, 55, frozenset({"MachineGone"})),
     ]

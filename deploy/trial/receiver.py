@@ -18,9 +18,20 @@ class Message:
     group: dict
     alerts: list
 
+    @property
+    def alerts_by_name(self):
+        """The alerts in lists by their name."""
+        names = {}
+        for alert in self.alerts:
+            names.setdefault(alert["labels"]["alertname"], []).append(alert)
+        return names
+
     def __str__(self):
-        names = Counter((each["labels"]["alertname"], each["status"]) for each in self.alerts)
-        alerts = ", ".join(f"{count} {name} {status}" for (name, status), count in names.items())
+        alerts = ", ".join(
+            f"{count} {name} {status}"
+            for name, alerts in self.alerts_by_name.items()
+            for status, count in Counter(each["status"] for each in alerts).items()
+        )
         group = " ".join(f"{name}={value}" for name, value in sorted(self.group.items()))
         return f"message to {self.receiver} ({group}): {alerts}"
 
