@@ -97,6 +97,16 @@ TEST_F(RecordTest, MachineWithoutSensorsIsRecordedAndSaid)
     EXPECT_THAT(ended.err, HasSubstr("this machine has no sensors"));
 }
 
+TEST_F(RecordTest, MachineWithoutSensorsLeavesTheOldFile)
+{
+    const std::string file = folder_.write("record.json", "precious");
+    const Ended ended = run({"record", "--model", model(""), "-o", file});
+    EXPECT_EQ(ended.code, 3);
+    EXPECT_EQ(ended.out, "");
+    EXPECT_THAT(ended.err, HasSubstr("this machine has no sensors"));
+    EXPECT_EQ(contentOf(file), "precious");
+}
+
 TEST_F(RecordTest, MachineThatCannotBeReadIsNoEmptyRecord)
 {
     const std::string file = folder_.write("record.json", "precious");

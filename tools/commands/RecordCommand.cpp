@@ -34,11 +34,12 @@ public:
     {
         source_.selectMachine();
         const std::string recording = escapeUnprintable(Vorn::recordMachineFile());
-        if (file_ && *file_ != "-")
-            replaceFile(*file_, recording);
-        else
+        const bool isEmpty = countSensors() == 0;
+        if (!file_ || *file_ == "-")
             out.write(recording);
-        return countSensors() == 0 ? complainOfEmptyMachine(source_.model()) : ExitCode::success;
+        else if (!isEmpty) // the file may be the reference of `check --expect`
+            replaceFile(*file_, recording);
+        return isEmpty ? complainOfEmptyMachine(source_.model()) : ExitCode::success;
     }
 
 private:
