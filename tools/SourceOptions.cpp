@@ -12,6 +12,7 @@
 #include <algorithm>
 #include <cmath>
 #include <cstdlib>
+#include <exception>
 #include <filesystem>
 
 namespace Tools {
@@ -56,10 +57,13 @@ bool SourceOptions::readsHwmon()
 
 std::string SourceOptions::ageOfCollection()
 {
-    for (const Vorn::SourceEntry& entry : sources())
-        if (entry.scheme == "ipmi")
-            if (const auto age = Vorn::IpmiSource(entry.argument).age())
-                return "read " + std::to_string(std::lround(*age)) + " s ago";
+    try {
+        for (const Vorn::SourceEntry& entry : sources())
+            if (entry.scheme == "ipmi")
+                if (const auto age = Vorn::IpmiSource(entry.argument).age(); age && *age >= 0)
+                    return "read " + std::to_string(std::lround(*age)) + " s ago";
+    } catch (const std::exception&) { // the library has reported the reason
+    }
     return "";
 }
 

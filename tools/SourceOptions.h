@@ -39,7 +39,7 @@ public:
     static bool readsHwmon();
 
     // Returns when the sensors of a management controller were read, such as "read 4 s ago"; an
-    // empty text where the machine has none.
+    // empty text where the machine has none, or where they cannot be read.
     static std::string ageOfCollection();
 
     // Throws std::runtime_error when no library is given and none is found.

@@ -93,9 +93,12 @@ TEST_F(CheckTest, WhatIsMissingFromTheExpectedMachineIsCritical)
     const std::string expected = folder_.write("expected.json", contentOf(smallModel()));
     EXPECT_EQ(checked({"cpu0", "--expect", expected}).code, 0);
     const std::string file = model(R"(
-        { "type": "tachometer", "path": "/board/fan1", "description": "Renamed", "status": 1 },
-        { "type": "voltage", "path": "/board/in1", "description": "+12V", "status": 1 },
-        { "type": "voltage", "path": "/new/in1", "description": "New", "status": 1 })");
+        { "type": "tachometer", "path": "/board/fan1", "description": "Renamed", "status": 1,
+          "reading": 900 },
+        { "type": "voltage", "path": "/board/in1", "description": "+12V", "status": 1,
+          "reading": 12 },
+        { "type": "voltage", "path": "/new/in1", "description": "New", "status": 1,
+          "reading": 1 })");
     const auto missing = [&](const std::vector<std::string>& more) {
         std::vector<std::string> arguments = {"check", "--model", file, "--expect", expected};
         arguments.insert(arguments.end(), more.begin(), more.end());

@@ -37,6 +37,17 @@ protected:
     }
 };
 
+TEST_F(ListTest, SensorsAreShownBesideACollectionThatCannotBeRead)
+{
+    const Ended ended = run({"list"},
+        {.environment = {{"RYNLOG_LOG", ""},
+             {"VORN_INSTRUMENTATION",
+                 "model:" + smallModel() + ",ipmi:" + folder_.write("damaged.json", "{")}}});
+    EXPECT_EQ(ended.code, 0);
+    EXPECT_THAT(ended.out, HasSubstr("\ncpu0\n  CPU 1 "));
+    EXPECT_THAT(ended.err, HasSubstr("damaged.json"));
+}
+
 TEST_F(ListTest, GroupsSensorsByTheFolderOfTheirPaths)
 {
     const Ended ended = listed(smallModel());

@@ -87,8 +87,8 @@ TEST_F(WatchTest, KeysFilterSortScrollAndQuit)
 {
     std::string nodes = node(85, 23);
     for (int i = 1; i <= 40; ++i)
-        nodes += R"(, { "type": "voltage", "status": 1, "path": "/a/in)" + std::to_string(i) +
-                 R"(", "description": "in)" + std::to_string(i) + "\" }";
+        nodes += R"(, { "type": "voltage", "status": 1, "reading": 1, "path": "/a/in)" +
+                 std::to_string(i) + R"(", "description": "in)" + std::to_string(i) + "\" }";
     change(nodes);
     const Tmux terminal(command(), 80, 24);
     EXPECT_THAT(terminal.waitFor("in1 "), Not(HasSubstr("CPU 1")));

@@ -2,9 +2,22 @@
 
 #include "platform/instrumentation/machinefile/MachineFileSource.h"
 
+#include "platform/instrumentation/NodeStatus.h"
 #include "platform/instrumentation/machinefile/MachineFileCache.h"
 
 namespace Vorn {
+
+namespace {
+
+// Returns whether the status says how the reading is: without one, the sensor would be published as
+// reading 0.
+bool isOfReadings(unsigned status)
+{
+    using namespace NodeStatus;
+    return status == normal || (status >= warning && status <= criticalHigh);
+}
+
+} // namespace
 
 MachineFileSource::MachineFileSource(const std::string& path)
     : file_(MachineFileCache::instance().load(path))
@@ -24,7 +37,10 @@ std::vector<Node> MachineFileSource::nodes(NodeLexicon::NodeType type)
 
 NodeReading MachineFileSource::read(const Node& node)
 {
-    return file_->nodes.at(node.token).values;
+    NodeReading reading = file_->nodes.at(node.token).values;
+    if (!reading.reading && isOfReadings(reading.status))
+        reading.status = NodeStatus::lostCommunication;
+    return reading;
 }
 
 void checkMachineFile(const std::string& path)

@@ -70,7 +70,23 @@ TEST_F(MachineFileSourceTest, IsServedInItsOwnOrder)
     EXPECT_EQ(nodes[1].sensorType, 7U);
     EXPECT_EQ(nodes[2].path, "/2");
     EXPECT_EQ(nodes[2].description, "");
-    EXPECT_EQ(nodes[2].values.status, 1U);
+}
+
+TEST_F(MachineFileSourceTest, ANodeWithoutAReadingIsNeverNormal)
+{
+    write(R"({"nodes":[
+        {"type":"voltage","path":"/1","description":"normal","status":1},
+        {"type":"voltage","path":"/2","description":"warning","status":22},
+        {"type":"voltage","path":"/3","description":"disabled","status":16},
+        {"type":"voltage","path":"/4","description":"out of contact","status":17},
+        {"type":"voltage","path":"/5","description":"normal","status":1,"reading":0}]})");
+    const auto nodes = walk();
+    ASSERT_THAT(nodes, SizeIs(5));
+    EXPECT_EQ(nodes[0].values.status, 13U);
+    EXPECT_EQ(nodes[1].values.status, 13U);
+    EXPECT_EQ(nodes[2].values.status, 16U);
+    EXPECT_EQ(nodes[3].values.status, 17U);
+    EXPECT_EQ(nodes[4].values.status, 1U);
 }
 
 TEST_F(MachineFileSourceTest, IsReadAfreshWhenItChanged)
