@@ -11,7 +11,7 @@ set(CPACK_RPM_SPEC_MORE_DEFINE "%define packager ${CPACK_PACKAGE_CONTACT}")
 # These folders belong to packages of the system.
 set(CPACK_RPM_EXCLUDE_FROM_AUTO_FILELIST_ADDITION
   /usr/lib/systemd /usr/lib/systemd/system /usr/lib/sysusers.d /usr/lib/udev
-  /usr/lib/udev/rules.d /usr/sbin /usr/share/licenses
+  /usr/lib/udev/rules.d /usr/libexec /usr/sbin /usr/share/licenses
   /usr/share/man /usr/share/man/man1 /usr/share/man/man5 /usr/share/man/man7 /usr/share/man/man8
   # Both packages have files in this folder. It belongs to the provider's.
   /usr/share/sensor-profile)

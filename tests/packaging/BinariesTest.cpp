@@ -74,7 +74,8 @@ TEST_P(InstalledBinaryTest, IsToldNoFoldersOfLibraries)
 }
 
 INSTANTIATE_TEST_SUITE_P(InstalledBinaries, InstalledBinaryTest,
-    testing::Values("bin/sensorctl", sensorLibrary, systemLibrary));
+    testing::Values(
+        "bin/sensorctl", "libexec/sensor-profile/sensorctl-collect", sensorLibrary, systemLibrary));
 
 TEST(InstalledLibraryTest, ExportsItsFactoriesAndNothingElse)
 {

@@ -122,10 +122,15 @@ TEST(RpmTest, OwnsItsFolders)
         ElementsAre("/usr/lib64/cmpi", "/usr/share/doc/sensor-profile-provider",
             "/usr/share/licenses/sensor-profile-provider", "/usr/share/sensor-profile",
             "/usr/share/sensor-profile/register", "/usr/share/sensor-profile/registration"));
-    EXPECT_THAT(
-        of(tool), ElementsAre("/etc/sensor-profile", "/usr/share/bash-completion",
-                      "/usr/share/bash-completion/completions", "/usr/share/doc/sensor-profile",
-                      "/usr/share/licenses/sensor-profile"));
+    EXPECT_THAT(of(tool),
+        ElementsAre("/etc/sensor-profile", "/usr/libexec/sensor-profile",
+            "/usr/share/bash-completion", "/usr/share/bash-completion/completions",
+            "/usr/share/doc/sensor-profile", "/usr/share/licenses/sensor-profile",
+            "/usr/share/sensor-profile/deploy", "/usr/share/sensor-profile/deploy/grafana",
+            "/usr/share/sensor-profile/deploy/prometheus",
+            "/usr/share/sensor-profile/deploy/prometheus/rules",
+            "/usr/share/sensor-profile/deploy/prometheus/targets",
+            "/usr/share/sensor-profile/deploy/victoria-metrics"));
 }
 
 TEST(RpmTest, BelongsToRootAndCanBeReadByEverybody)

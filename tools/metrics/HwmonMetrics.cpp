@@ -47,7 +47,7 @@ struct Unit {
 };
 
 // The kinds of attributes with the units of those elements that are not listed below.
-constexpr std::array<std::pair<std::string_view, Unit>, 10> kinds = {{
+constexpr std::array<std::pair<std::string_view, Unit>, 10> channelKinds = {{
     {"cpu", {"_volts", Scale::milli}},
     {"curr", {"_amps", Scale::milli}},
     {"energy", {"_joule_total", Scale::micro}},
@@ -103,9 +103,9 @@ std::optional<Attribute> attributeOf(std::string_view name)
     const std::size_t sensorEnd = std::min(name.find_first_not_of(digits, kindEnd), name.size());
     const std::string_view kind = name.substr(0, kindEnd);
     std::string_view element = name.substr(sensorEnd);
-    const auto* const known = std::find_if(
-        kinds.begin(), kinds.end(), [&](const auto& each) { return each.first == kind; });
-    if (known == kinds.end() || kindEnd == sensorEnd || element == "_" ||
+    const auto* const known = std::find_if(channelKinds.begin(), channelKinds.end(),
+        [&](const auto& each) { return each.first == kind; });
+    if (known == channelKinds.end() || kindEnd == sensorEnd || element == "_" ||
         (!element.empty() && !element.starts_with('_')))
         return std::nullopt;
     element.remove_prefix(element.empty() ? 0 : 1);

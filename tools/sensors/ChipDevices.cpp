@@ -23,7 +23,7 @@ namespace {
 
 namespace Files = std::filesystem;
 
-constexpr const char* hwmonFolder = "/sys/class/hwmon";
+constexpr const char* folderOfChips = "/sys/class/hwmon";
 constexpr const char* slotFolder = "/sys/bus/pci/slots";
 
 // Returns the first line of a file; an empty text when there is none.
@@ -118,8 +118,8 @@ void nameDevices(Sensors& sensors)
     if (named.empty())
         return;
     std::map<std::string, std::string> devices;
-    for (const std::string& entry : entriesOf(hwmonFolder)) {
-        const std::string folder = std::string(hwmonFolder).append("/").append(entry);
+    for (const std::string& entry : entriesOf(folderOfChips)) {
+        const std::string folder = std::string(folderOfChips).append("/").append(entry);
         if (const std::string name = lineIn(folder + "/name"); named.contains(name))
             addDevice(devices, folder, name);
     }
@@ -142,8 +142,9 @@ std::string otherChannels()
         OtherKind{"intrusion", "_alarm", "intrusion"}};
     std::set<std::string> channels;
     std::set<std::string> kinds;
-    for (const std::string& chip : entriesOf(hwmonFolder))
-        for (const std::string& name : entriesOf(std::string(hwmonFolder).append("/").append(chip)))
+    for (const std::string& chip : entriesOf(folderOfChips))
+        for (const std::string& name :
+            entriesOf(std::string(folderOfChips).append("/").append(chip)))
             for (const OtherKind& each : otherKinds)
                 if (name.starts_with(each.attribute) && name.ends_with(each.suffix)) {
                     channels.insert(chip + name.substr(0, name.size() - each.suffix.size()));

@@ -78,13 +78,13 @@ std::map<std::string, bool> statesOfSources(const Sensors& sensors)
     Identifiers harvested;
     for (const Sensor& sensor : sensors)
         harvested.insert(sensor.deviceId);
-    std::map<std::string, bool> states;
+    std::map<std::string, bool> isUpByName;
     for (const Vorn::SourceEntry& entry : SourceOptions::sources()) {
         const std::string& name = entry.scheme == "hwmon" ? entry.scheme : entry.text;
-        bool& areAllUp = states.try_emplace(name, true).first->second;
+        bool& areAllUp = isUpByName.try_emplace(name, true).first->second;
         areAllUp = areAllUp && isUp(entry, harvested);
     }
-    return states;
+    return isUpByName;
 }
 
 } // namespace

@@ -1,0 +1,186 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// The program that `sensorctl collect` executes. It runs as long as the machine, and so without the
+// libraries of the other commands in its memory.
+
+#include "platform/instrumentation/machinefile/MachineFileWriter.h"
+#include "tools/collect/CollectOptions.h"
+#include "tools/collect/Collector.h"
+#include "tools/collect/IpmiDevice.h"
+#include "tools/output/FileReplacement.h"
+#include "tools/output/JsonText.h"
+#include "tools/output/Output.h"
+#include "tools/serve/ServiceManager.h"
+
+#include <CLI/CLI.hpp>
+
+#include <fcntl.h>
+#include <sys/file.h>
+#include <unistd.h>
+
+#include <algorithm>
+#include <cerrno>
+#include <chrono>
+#include <cstdlib>
+#include <filesystem>
+#include <stdexcept>
+#include <string>
+#include <system_error>
+#include <thread>
+#include <utility>
+
+namespace {
+
+using namespace Tools;
+
+using Period = std::chrono::steady_clock::duration;
+
+// Keeps other collectors from the same file during its lifetime.
+class CollectionLock {
+public:
+    // Throws std::runtime_error when another process has the lock, or when there can be none. The
+    // file of the lock is never removed: a process that has just opened it could lock nothing then.
+    explicit CollectionLock(const std::string& collection)
+    {
+        const std::string path = collection + ".lock";
+        file_ = ::open(path.c_str(), O_RDWR | O_CREAT | O_CLOEXEC | O_NOFOLLOW, 0600);
+        if (file_ < 0)
+            throw std::system_error(errno, std::generic_category(), path);
+        if (::flock(file_, LOCK_EX | LOCK_NB) == 0)
+            return;
+        const int error = errno;
+        ::close(file_);
+        if (error == EWOULDBLOCK)
+            throw std::runtime_error("another process renews " + collection + " already");
+        throw std::system_error(error, std::generic_category(), path);
+    }
+    ~CollectionLock() { ::close(file_); }
+    CollectionLock(const CollectionLock&) = delete;
+    CollectionLock& operator=(const CollectionLock&) = delete;
+
+private:
+    int file_;
+};
+
+// Reports a problem to standard error when it begins and when it is over.
+class Condition {
+public:
+    explicit Condition(std::string good) : good_(std::move(good)) {}
+
+    // An empty problem is none.
+    void report(const std::string& problem)
+    {
+        if (problem != reported_)
+            complain(problem.empty() ? good_ : problem);
+        reported_ = problem;
+    }
+
+private:
+    std::string good_;
+    std::string reported_;
+};
+
+class Collection {
+public:
+    // The options must outlive the object.
+    explicit Collection(const CollectOptions& options) : options_(options) {}
+
+    // Writes the file once, or again and again. Throws std::exception where it cannot begin.
+    void run()
+    {
+        {
+            const Ipmi::IpmiDevice device; // throws where there is none, or none may be used
+        }
+        if (options_.file == Vorn::defaultCollection)
+            std::filesystem::create_directory(std::filesystem::path(options_.file).parent_path());
+        const CollectionLock lock(options_.file);
+        period_ = interval();
+        Ipmi::Collector collector({.readsDiscrete = has(discreteReading),
+            .ignoresScanning = has(ignoreScanningDisabled),
+            .assumesBmcOwner = has(assumeBmcOwner)});
+        if (options_.isOnce) {
+            read(collector);
+            write(collector);
+            return;
+        }
+        collectForever(collector);
+    }
+
+private:
+    bool has(const std::string& workaround) const
+    {
+        return std::find(options_.workarounds.begin(), options_.workarounds.end(), workaround) !=
+               options_.workarounds.end();
+    }
+
+    [[noreturn]] void collectForever(Ipmi::Collector& collector)
+    {
+        Condition reading("the sensors are read again");
+        Condition writing(options_.file + " is written again");
+        for (bool isFirst = true;; isFirst = false) {
+            const auto begin = std::chrono::steady_clock::now();
+            try {
+                read(collector);
+                reading.report("");
+            } catch (const std::exception& error) {
+                reading.report(error.what());
+                collector.loseAll();
+            }
+            try {
+                write(collector);
+                writing.report("");
+            } catch (const std::exception& error) {
+                writing.report(error.what());
+            }
+            if (isFirst)
+                notifyServiceManager("READY=1");
+            std::this_thread::sleep_until(begin + period_);
+        }
+    }
+
+    void read(Ipmi::Collector& collector)
+    {
+        constexpr int shareOfTime = 5; // a slow BMC is used for a fifth of the time at most
+        const auto begin = std::chrono::steady_clock::now();
+        // The device is opened for each pass, since the kernel may have removed it meanwhile.
+        Ipmi::IpmiDevice device;
+        collector.pass(device, period_);
+        period_ =
+            std::max<Period>(interval(), shareOfTime * (std::chrono::steady_clock::now() - begin));
+    }
+
+    Period interval() const { return std::chrono::seconds(options_.interval); }
+
+    // Does nothing before the sensors are known: a file of an earlier process says which there are.
+    void write(const Ipmi::Collector& collector)
+    {
+        if (!collector.knowsSensors())
+            return;
+        const Vorn::Renewal renewal{
+            std::chrono::duration<double>(period_).count(), Vorn::secondsSinceStart()};
+        const auto nodes = options_.isOnlyPresent ? collector.presentNodes() : collector.nodes();
+        replaceFile(options_.file, escapeUnprintable(Vorn::writeMachineFile({nodes, renewal})));
+    }
+
+    const CollectOptions& options_;
+    Period period_{};
+};
+
+} // namespace
+
+int main(int argc, char** argv)
+{
+    CollectOptions options;
+    CLI::App parser("Reads the sensors of the BMC", "sensorctl collect");
+    options.addTo(parser);
+    try {
+        parser.parse(argc, argv);
+        Collection(options).run();
+        return EXIT_SUCCESS;
+    } catch (const CLI::ParseError& error) {
+        return parser.exit(error);
+    } catch (const std::exception& error) {
+        complain(error.what());
+        return EXIT_FAILURE;
+    }
+}
