@@ -185,7 +185,7 @@ nlohmann::json shownWith(unsigned status)
 {
     const TemporaryFolder files;
     const std::string model = files.write("model.json",
-        R"({"nodes": [{"type": "voltage", "path": "/1", "description": "S", "status": )" +
+        R"({"nodes": [{"type": "voltage", "path": "/1", "description": "S", "reading": 1, "status": )" +
             std::to_string(status) + "}]}");
     const auto document = nlohmann::json::parse(run({"list", "--cim", "--model", model}).out);
     return document["instances"][0]["properties"];
