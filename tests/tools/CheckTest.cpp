@@ -39,8 +39,8 @@ TEST_F(CheckTest, WorstSensorDecidesAndComesFirst)
     EXPECT_EQ(ended.code, 2);
     EXPECT_EQ(ended.out,
         "SENSORS CRITICAL - cpu1/CPU 2: Critical high (97 C), board/+12V: Warning high (12.75 V), "
-        "board/fan2: Lost - 5 sensors: 2 normal, 1 warning, 1 critical, 1 lost. | "
-        "'board/+12V'=12.75V;~:12.5;10.5: 'board/Fan'=1200;300:; 'cpu0/CPU 1'=41C;5:80;~:95 "
+        "board/Fan (fan2): Lost - 5 sensors: 2 normal, 1 warning, 1 critical, 1 lost. | "
+        "'board/+12V'=12.75V;~:12.5;10.5: 'board/Fan (fan1)'=1200;300:; 'cpu0/CPU 1'=41C;5:80;~:95 "
         "'cpu1/CPU 2'=97C;;~:95\n");
 }
 
@@ -50,9 +50,24 @@ TEST_F(CheckTest, ExitCodeFollowsTheStates)
     EXPECT_EQ(
         checked({"cpu0"}).out, "SENSORS OK - 1 sensor: 1 normal. | 'cpu0/CPU 1'=41C;5:80;~:95\n");
     EXPECT_EQ(checked({"fan2"}).code, 1);
-    EXPECT_EQ(checked({"fan2"}).out, "SENSORS WARNING - board/Fan: Lost - 1 sensor: 1 lost.\n");
+    EXPECT_EQ(
+        checked({"fan2"}).out, "SENSORS WARNING - board/Fan (fan2): Lost - 1 sensor: 1 lost.\n");
     EXPECT_EQ(checked({"--kind", "voltage"}).code, 1);
     EXPECT_EQ(checked({"--kind", "temperature"}).code, 2);
+}
+
+TEST_F(CheckTest, SeriesKeepTheirNamesInEverySelection)
+{
+    const std::string nodes[] = {
+        R"({ "type": "tachometer", "path": "/b/fan1", "description": "Fan", "status": 1, "reading": 9 })",
+        R"({ "type": "tachometer", "path": "/b/fan2", "description": "Fan", "status": 1, "reading": 8 })",
+        R"({ "type": "tachometer", "path": "/c/fan1", "description": "Fan", "status": 1, "reading": 7 })"};
+    const std::string file = model(nodes[0] + "," + nodes[1] + "," + nodes[2]);
+    EXPECT_THAT(
+        checkedFile(file).out, EndsWith("| 'b/Fan (fan1)'=9;; 'b/Fan (fan2)'=8;; 'c/Fan'=7;;\n"));
+    EXPECT_THAT(checkedFile(file, {"fan2"}).out, EndsWith("| 'b/Fan (fan2)'=8;;\n"));
+    EXPECT_THAT(checkedFile(file, {"/b/fan1"}).out, EndsWith("| 'b/Fan (fan1)'=9;;\n"));
+    EXPECT_THAT(checkedFile(file, {"c"}).out, EndsWith("| 'c/Fan'=7;;\n"));
 }
 
 TEST_F(CheckTest, PerformanceDataHasTheFormOfPlugins)

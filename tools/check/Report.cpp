@@ -144,14 +144,17 @@ std::string Report::toText(const std::string& summary, bool isUtf8) const
            printable(text, isUtf8) + (performance_.empty() ? "" : " |" + performance_) + "\n";
 }
 
-void addSensors(Report& report, const Sensors& sensors, const Overrides& overrides)
+void addSensors(
+    Report& report, const Sensors& sensors, const Sensors& machine, const Overrides& overrides)
 {
-    std::set<std::string> names;
+    const auto nameOf = [](const Sensor& sensor) { return sensor.chip + "/" + sensor.label; };
+    std::map<std::string, std::size_t> counts;
+    for (const Sensor& sensor : machine)
+        ++counts[nameOf(sensor)];
     for (const Sensor& sensor : sensors) {
-        std::string name = sensor.chip + "/" + sensor.label;
-        if (!names.insert(name).second)
-            name = sensor.chip + "/" + sensor.feature;
-        report.add(sensor, name, overrides);
+        const std::string name = nameOf(sensor);
+        report.add(
+            sensor, counts[name] == 1 ? name : name + " (" + sensor.feature + ")", overrides);
     }
 }
 

@@ -51,9 +51,10 @@ private:
     std::string performance_;
 };
 
-// Adds the sensors with unique names: chip and label, or chip and channel where another sensor has
-// the name.
-void addSensors(Report& report, const Sensors& sensors, const Overrides& overrides);
+// Adds the sensors by names that are unique on the machine, which has all of them: chip and label,
+// with the channel where several share these. So a name does not depend on what is selected.
+void addSensors(
+    Report& report, const Sensors& sensors, const Sensors& machine, const Overrides& overrides);
 
 // Adds the chips and sensors that are expected but missing or without contact, as critical
 // problems.

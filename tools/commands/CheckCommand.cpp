@@ -77,7 +77,7 @@ public:
         Report report;
         const auto selected = selection_.select(all);
         addMissing(report, expected, all);
-        addSensors(report, selected.sensors, overrides);
+        addSensors(report, selected.sensors, all, overrides);
         for (const auto* const list : {&overrides.warning, &overrides.critical})
             for (const Override& each : *list)
                 if (std::none_of(all.begin(), all.end(),
