@@ -40,6 +40,30 @@ TEST_F(SelectionTest, SelectorsAreNamesAndPatternsInAnyCase)
     EXPECT_THAT(idsOf({"fan2"}), ElementsAre("Fan:/board/fan2"));
 }
 
+TEST_F(SelectionTest, AddressesOfChipsMayBeShortened)
+{
+    const std::string file = model(R"(
+        { "type": "tachometer", "path": "/hwmon/nct6798-isa-0290/fan1", "description": "A", "status": 1 },
+        { "type": "tachometer", "path": "/hwmon/coretemp-isa-0000/fan1", "description": "B", "status": 1 },
+        { "type": "tachometer", "path": "/hwmon/jc42-i2c-0-1a/fan1", "description": "C", "status": 1 })");
+    const auto labels = [&](const std::string& selector) {
+        std::string found;
+        for (const auto& sensor :
+            nlohmann::json::parse(run({"list", "--json", "--model", file, selector}).out))
+            found += sensor.at("label");
+        return found;
+    };
+    for (const char* const selector : {"nct6798-isa-290", "nct6798-isa-0x290", "NCT6798-ISA-00290",
+             "nct6798-isa-0290", "*-isa-290"})
+        EXPECT_EQ(labels(selector), "A") << selector;
+    for (const char* const selector : {"coretemp-isa-0", "coretemp-isa-0x0", "coretemp-isa-0000"})
+        EXPECT_EQ(labels(selector), "B") << selector;
+    EXPECT_EQ(labels("jc42-i2c-*-0x1A"), "C");
+    EXPECT_EQ(labels("nct6798-isa-29"), "");
+    EXPECT_EQ(labels("nct6798-isa-2900"), "");
+    EXPECT_EQ(labels("nct6798-isa-"), "");
+}
+
 TEST_F(SelectionTest, SeveralSelectorsAddUp)
 {
     EXPECT_THAT(idsOf({"cpu 1", "CPU*", "in1"}),

@@ -47,6 +47,30 @@ std::size_t distanceFrom(std::string_view text, std::string_view name)
     return *std::min_element(last.begin(), last.end());
 }
 
+// Returns the name of a chip with its address as a number without leading zeros, as libsensors
+// compares them: hexadecimal after the last dash, with or without 0x. Returns other names
+// unchanged.
+std::string withPlainAddress(const std::string& chip)
+{
+    const std::size_t dash = chip.rfind('-');
+    if (dash == std::string::npos)
+        return chip;
+    std::string_view digits = std::string_view(chip).substr(dash + 1);
+    if (digits.starts_with("0x") || digits.starts_with("0X"))
+        digits.remove_prefix(2);
+    if (digits.empty() || digits.find_first_not_of("0123456789abcdefABCDEF") != digits.npos)
+        return chip;
+    const std::size_t zeros = std::min(digits.find_first_not_of('0'), digits.size() - 1);
+    return chip.substr(0, dash + 1).append(digits.substr(zeros));
+}
+
+bool isMatch(const std::string& selector, const std::string& name)
+{
+    return Host::equalNames(name, selector) ||
+           (isPattern(selector) &&
+               ::fnmatch(selector.c_str(), name.c_str(), FNM_CASEFOLD | FNM_NOESCAPE) == 0);
+}
+
 } // namespace
 
 bool selects(const std::string& selector, const Sensor& sensor)
@@ -54,11 +78,9 @@ bool selects(const std::string& selector, const Sensor& sensor)
     const std::array<std::string, 7> names = {sensor.chip, sensor.label, sensor.feature,
         sensor.path, sensor.deviceId, sensor.chip + "/" + sensor.label,
         sensor.chip + "/" + sensor.feature};
-    return std::any_of(names.begin(), names.end(), [&](const std::string& name) {
-        return Host::equalNames(name, selector) ||
-               (isPattern(selector) &&
-                   ::fnmatch(selector.c_str(), name.c_str(), FNM_CASEFOLD | FNM_NOESCAPE) == 0);
-    });
+    return isMatch(withPlainAddress(selector), withPlainAddress(sensor.chip)) ||
+           std::any_of(names.begin(), names.end(),
+               [&](const std::string& name) { return isMatch(selector, name); });
 }
 
 bool isOfKind(const std::vector<std::string>& kinds, const Sensor& sensor)

@@ -13,7 +13,7 @@ namespace Tools {
 
 // Returns whether the selector is the chip, the label, the feature, the path or the DeviceID of the
 // sensor, or chip and label or feature with a slash between them, in any letter case; or a pattern
-// of fnmatch(3) that one of them matches.
+// of fnmatch(3) that one of them matches. The address of a chip may be shortened.
 bool selects(const std::string& selector, const Sensor& sensor);
 
 // Returns whether the sensor is of one of the kinds, or there are none.
