@@ -12,6 +12,7 @@ class App;
 
 namespace Tools {
 
+class LibraryLog;
 class Output;
 
 enum class ExitCode {
@@ -39,6 +40,10 @@ public:
     // Reports why the command line is invalid or run() failed. Returns the exit code of the
     // process: the given one unless the command has other conventions.
     virtual ExitCode reportFailure(Output& out, const std::string& reason, ExitCode code) const;
+
+    // Gives the command the libraries' log, which outlives run(). What the command does not take
+    // from it is printed when run() has returned.
+    virtual void useLog(LibraryLog& /*log*/) {}
 
     // Returns whether the libraries' log is a result of the command. It is collected otherwise.
     virtual bool writesLog() const { return false; }

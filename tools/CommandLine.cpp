@@ -77,31 +77,24 @@ ExitCode refuse(
     return ExitCode::wrongUsage;
 }
 
-// Writes the messages to standard error, but for those that contain a text that is written anyway.
-void printMessages(const std::vector<std::string>& messages, const std::string& known)
-{
-    for (const std::string& message : messages)
-        if (known.empty() || message.find(known) == std::string::npos)
-            writeAll(STDERR_FILENO, message + "\n");
-}
-
 // Runs a command and prints what its libraries logged.
 ExitCode runCommand(Command& command, Output& out)
 {
     if (command.writesLog())
         return command.run(out);
-    const LibraryLog log;
+    LibraryLog log;
+    command.useLog(log);
     try {
         const ExitCode code = command.run(out);
         out.flush();
-        printMessages(log.messages(), "");
+        log.printMessages("");
         for (const std::string& message : refusedSensors())
             complain(message);
         return code;
     } catch (const UsageError&) {
         throw;
     } catch (const std::exception& error) {
-        printMessages(log.messages(), error.what());
+        log.printMessages(error.what());
         throw;
     }
 }

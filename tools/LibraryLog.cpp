@@ -2,13 +2,17 @@
 
 #include "tools/LibraryLog.h"
 
+#include "tools/output/Output.h"
+
 #include <sys/mman.h>
 #include <unistd.h>
 
 #include <algorithm>
+#include <cerrno>
 #include <cstdlib>
 #include <fstream>
 #include <optional>
+#include <system_error>
 
 namespace Tools {
 
@@ -52,18 +56,30 @@ LibraryLog::~LibraryLog()
         ::close(file_);
 }
 
-std::vector<std::string> LibraryLog::messages() const
+std::vector<std::string> LibraryLog::takeMessages(const std::string& shown)
 {
     std::vector<std::string> messages;
     if (file_ < 0)
         return messages;
     std::ifstream lines(pathOf(file_));
     for (std::string line; std::getline(lines, line);) {
-        auto message = messageIn(line);
-        if (message && std::find(messages.begin(), messages.end(), *message) == messages.end())
-            messages.push_back(std::move(*message));
+        const auto message = messageIn(line);
+        if (!message || std::find(taken_.begin(), taken_.end(), *message) != taken_.end())
+            continue;
+        taken_.push_back(*message);
+        if (shown.empty() || message->find(shown) == std::string::npos)
+            messages.push_back(*message);
     }
+    // The libraries append to the file.
+    if (::ftruncate(file_, 0) != 0)
+        throw std::system_error(errno, std::generic_category());
     return messages;
+}
+
+void LibraryLog::printMessages(const std::string& shown)
+{
+    for (const std::string& message : takeMessages(shown))
+        writeAll(STDERR_FILENO, message + "\n");
 }
 
 } // namespace Tools

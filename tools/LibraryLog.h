@@ -18,12 +18,17 @@ public:
     LibraryLog(const LibraryLog&) = delete;
     LibraryLog& operator=(const LibraryLog&) = delete;
 
-    // Returns the texts of the messages, each once: mistakes in the sensors configuration, and
-    // sources that cannot be used.
-    std::vector<std::string> messages() const;
+    // Returns the texts of the messages since the last call, each once in the lifetime of the log,
+    // but for those that contain a text that is shown anyway: mistakes in the sensors
+    // configuration, and sources that cannot be used.
+    std::vector<std::string> takeMessages(const std::string& shown);
+
+    // Writes these messages to standard error. Throws std::system_error.
+    void printMessages(const std::string& shown);
 
 private:
     int file_ = -1; // in memory; -1 where nothing is collected
+    std::vector<std::string> taken_;
 };
 
 } // namespace Tools

@@ -4,6 +4,7 @@
 
 #include "tests/support/MountNamespace.h"
 #include "tests/support/SensorsProgram.h"
+#include "tests/tools/Tmux.h"
 #include "tests/tools/ToolTest.h"
 
 #include <gmock/gmock.h>
@@ -17,6 +18,7 @@
 namespace {
 
 using nlohmann::json;
+using testing::HasSubstr;
 using namespace Testing;
 
 std::map<std::string, json> listedSensors()
@@ -213,6 +215,26 @@ TEST_F(ConfigurationMistakesTest, AreToldOnceInTheWordsOfSensors)
         EXPECT_EQ(ended.code, 0);
         EXPECT_EQ(ended.err, expected) << command;
     }
+}
+
+TEST_F(ConfigurationMistakesTest, AreToldByWatchAtOnce)
+{
+    const BoundSysfs sysfs("desktop");
+    const BoundSensorsConfiguration configuration("chip \"*-*\"\n"
+                                                  "  lable temp1 \"First\"\n"
+                                                  "  compute in0 @*(\n");
+    const std::string expected = standardErrorOf("/usr/bin/sensors");
+    const TemporaryFolder folder;
+    const std::string err = (folder.path() / "err").string();
+    const std::string watch =
+        "env -u RYNLOG_LOG ASAN_OPTIONS=detect_leaks=0 " + sensorctl + " watch --interval 0.1";
+    run({"-c", watch + " 2>" + err + " & while [ ! -s " + err +
+                   " ]; do sleep 0.1; done; sleep 0.5; kill $!"},
+        {.program = "/bin/sh"});
+    EXPECT_EQ(contentOf(err), expected);
+    const Tmux terminal(watch, 120, 24);
+    EXPECT_THAT(
+        terminal.waitFor("line 4: "), HasSubstr("Error: File /etc/sensors3.conf, line 2: "));
 }
 
 } // namespace

@@ -176,6 +176,36 @@ TEST_F(WatchTest, WithoutATerminalPrintsEachChange)
             << line;
 }
 
+TEST_F(WatchTest, SourceThatFailsIsTheReasonOnTheScreen)
+{
+    change(node(41, 1) + fan());
+    const Tmux terminal(command(), 80, 24);
+    terminal.waitFor("2 sensors: 2 normal.");
+    change("nothing of a model");
+    const std::string failed = terminal.waitFor("model file");
+    EXPECT_THAT(failed, AllOf(HasSubstr("41 °C"), Not(HasSubstr("Missing"))));
+    change(node(42, 1) + fan());
+    EXPECT_THAT(terminal.waitFor("2 sensors: 2 normal."), Not(HasSubstr("Missing")));
+}
+
+TEST_F(WatchTest, SourceThatFailsIsTheReasonInAPipe)
+{
+    change(node(41, 1));
+    folder_.write("torn", "{");
+    folder_.write("warning", "{ \"nodes\": [" + node(85, 23) + "] }");
+    const std::string script =
+        "cd " + folder_.path().string() + "; " + sensorctl +
+        " watch --interval 0.1 --model watched.json >out 2>err & sleep 1; mv torn watched.json; "
+        "while [ ! -s err ]; do sleep 0.1; done; sleep 0.5; mv warning watched.json; "
+        "while [ ! -s out ]; do sleep 0.1; done; kill $!; cat out; cat err >&2";
+    const Ended ended =
+        run({"-c", script}, {.program = "/bin/sh", .environment = {{"RYNLOG_LOG", ""}}});
+    EXPECT_EQ(linesOf(ended.out).size(), 1U) << ended.out;
+    EXPECT_THAT(ended.out, HasSubstr(" cpu/CPU 1: Normal -> Warning high"));
+    EXPECT_EQ(linesOf(ended.err).size(), 1U) << ended.err;
+    EXPECT_THAT(ended.err, StartsWith("sensorctl: model file "));
+}
+
 TEST_F(WatchTest, WhatNothingMatchesIsSaidBeforeTheScreenIsTaken)
 {
     change(node(41, 1));

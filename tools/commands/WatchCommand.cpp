@@ -1,6 +1,7 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
 #include "tools/EmptyMachine.h"
+#include "tools/LibraryLog.h"
 #include "tools/SourceOptions.h"
 #include "tools/cim/ProviderClient.h"
 #include "tools/commands/Commands.h"
@@ -21,6 +22,7 @@
 #include <cstdlib>
 #include <ctime>
 #include <limits>
+#include <optional>
 #include <stdexcept>
 #include <thread>
 
@@ -73,6 +75,8 @@ public:
         parser().footer(watchFooter);
     }
 
+    void useLog(LibraryLog& log) override { log_ = &log; }
+
     ExitCode run(Output& out) override
     {
         source_.selectMachine();
@@ -86,8 +90,9 @@ public:
 private:
     ExitCode watch(Output& out)
     {
-        ProviderClient provider(source_.providerFiles());
-        const Sensors all = readSensors(provider, false);
+        const std::vector<std::string> refused = refusedSensors();
+        std::optional<ProviderClient> provider(std::in_place, source_.providerFiles());
+        const Sensors all = readSensors(*provider, false);
         isMachineEmpty_ = all.empty();
         const auto selected = selection_.select(all);
         if (!isMachineEmpty_)
@@ -97,32 +102,63 @@ private:
             return ExitCode::nothingFound;
         if (isScreen())
             return showScreen(provider);
+        for (const std::string& message : refused)
+            complain(message);
         printChanges(provider, out);
     }
 
-    Sensors readSelected(ProviderClient& provider) const
+    // Throws std::runtime_error with the reason where the sensors cannot be read. There is no
+    // provider then, and the next call loads it again.
+    Sensors readSelected(std::optional<ProviderClient>& provider) const
     {
-        provider.beginRequest();
-        Sensors sensors = selection_.select(readSensors(provider, false)).sensors;
+        if (provider)
+            provider->beginRequest();
+        else
+            provider.emplace(source_.providerFiles());
+        Sensors all = readSensors(*provider, false);
+        if (all.empty()) {
+            provider.reset();
+            checkMachineIsEmpty();
+        }
+        Sensors sensors = selection_.select(std::move(all)).sensors;
         if (SourceOptions::readsHwmon())
             nameDevices(sensors);
         return sensors;
     }
 
-    // Returns when a write fails by an exception only.
-    [[noreturn]] void printChanges(ProviderClient& provider, Output& out) const
+    struct Renewal {
+        std::vector<Change> changes;
+        std::string failure; // empty when the sensors could be read
+    };
+
+    Renewal renew(std::optional<ProviderClient>& provider, History& history) const
     {
-        History history;
-        for (;; std::this_thread::sleep_for(std::chrono::duration<double>(interval_))) {
-            const std::time_t now = std::time(nullptr);
-            for (const Change& change : history.update(readSelected(provider), now))
-                out.write(timeStamp(change.time) + " " +
-                          printable(change.text, display_.style().isUtf8) + "\n");
-            out.flush();
+        try {
+            return {history.update(readSelected(provider), std::time(nullptr)), ""};
+        } catch (const std::runtime_error& error) {
+            return {{}, error.what()};
         }
     }
 
-    ExitCode showScreen(ProviderClient& provider) const
+    // Returns when a write fails by an exception only.
+    [[noreturn]] void printChanges(std::optional<ProviderClient>& provider, Output& out) const
+    {
+        History history;
+        std::string failure;
+        for (;; std::this_thread::sleep_for(std::chrono::duration<double>(interval_))) {
+            const Renewal renewal = renew(provider, history);
+            for (const Change& change : renewal.changes)
+                out.write(timeStamp(change.time) + " " +
+                          printable(change.text, display_.style().isUtf8) + "\n");
+            out.flush();
+            if (!renewal.failure.empty() && renewal.failure != failure)
+                complain(renewal.failure);
+            failure = renewal.failure;
+            log_->printMessages(failure);
+        }
+    }
+
+    ExitCode showScreen(std::optional<ProviderClient>& provider) const
     {
         const std::chrono::milliseconds interval(static_cast<long>(interval_ * 1000));
         Screen screen(display_.style().isColored);
@@ -133,7 +169,7 @@ private:
         Clock::time_point next = Clock::now();
         for (Key key = Key::none; key != Key::quit;) {
             if (Clock::now() >= next) {
-                renew(provider, history, view);
+                update(view, renew(provider, history));
                 next = Clock::now() + interval;
             }
             const TextStyle style = {screen.width(), false, screen.isUtf8()};
@@ -146,14 +182,12 @@ private:
         return ExitCode::success;
     }
 
-    void renew(ProviderClient& provider, History& history, WatchView& view) const
+    void update(WatchView& view, const Renewal& renewal) const
     {
-        try {
-            view.add(history.update(readSelected(provider), std::time(nullptr)));
-            view.setFailure("");
-        } catch (const std::runtime_error& error) {
-            view.setFailure(error.what());
-        }
+        view.add(renewal.changes);
+        view.setFailure(renewal.failure);
+        for (const std::string& message : log_->takeMessages(renewal.failure))
+            view.add({{std::time(nullptr), message, Urgency::warning}});
     }
 
     static void apply(Key key, WatchView& view, int page)
@@ -193,6 +227,7 @@ private:
     bool isMachineEmpty_ = false;
     DisplayOptions display_;
     SourceOptions source_;
+    LibraryLog* log_ = nullptr;
 };
 
 } // namespace
