@@ -141,6 +141,25 @@ TEST_F(CheckTest, ASensorWithoutContactIsAProblemWhereItIsExpected)
         "SENSORS CRITICAL - /ipmi/20/0/1 has no contact - 1 sensor: 1 inactive.\n");
 }
 
+TEST_F(CheckTest, ASensorInAnUnknownStateIsUnknownUnlessSomethingIsWorse)
+{
+    constexpr const char* nodes = R"(
+        { "type": "temperature", "path": "/a/temp1", "description": "A", "status": 0,
+          "baseUnits": 2, "reading": 50 },
+        { "type": "voltage", "path": "/b/in1", "description": "B", "status": 23,
+          "baseUnits": 5, "reading": 13 })";
+    const std::string file = model(nodes);
+    EXPECT_EQ(checkedFile(file, {"a"}).code, 3);
+    EXPECT_THAT(checkedFile(file, {"a"}).out,
+        StartsWith("SENSORS UNKNOWN - a/A: Unknown (50 C) - 1 sensor: 1 unknown. | "));
+    EXPECT_EQ(checkedFile(file).code, 1);
+    EXPECT_THAT(
+        checkedFile(file).out, HasSubstr("b/B: Warning high (13 V), a/A: Unknown (50 C) - "));
+    EXPECT_EQ(checkedFile(file, {"a", "--warning", "a=60"}).code, 3);
+    EXPECT_EQ(checkedFile(file, {"a", "--warning", "a=60", "--critical", "a=70"}).code, 0);
+    EXPECT_EQ(checkedFile(file, {"a", "--warning", "a=60", "--critical", "a=40"}).code, 2);
+}
+
 TEST_F(CheckTest, ManyProblemsAreCounted)
 {
     const auto checkedWith = [&](int sensors) {

@@ -61,6 +61,9 @@ Verdict verdictOn(const Sensor& sensor, const Range* warning, const Range* criti
         return {CheckStatus::warning, warning};
     if (isProblem(sensor.state.urgency) && (warning == nullptr || !hasReading))
         return {CheckStatus::warning};
+    const bool isJudgedByRanges = hasReading && warning != nullptr && critical != nullptr;
+    if (sensor.state.urgency == Urgency::unknown && !isJudgedByRanges)
+        return {CheckStatus::unknown};
     return {};
 }
 
