@@ -45,6 +45,11 @@ std::string quoted(const std::string& text)
     return word + "'";
 }
 
+std::string option(const std::string& name, const std::optional<std::string>& value)
+{
+    return value ? " " + name + " " + quoted(*value) : "";
+}
+
 } // namespace
 
 std::size_t countSensors()
@@ -83,13 +88,14 @@ ExitCode complainOfEmptyMachine(const std::optional<std::string>& model)
 }
 
 ExitCode complainOfNoObject(
-    const ObjectFound& found, const std::string& command, const std::optional<std::string>& model)
+    const ObjectFound& found, const std::string& command, const SourceOptions& source)
 {
     if (found.isMachineEmpty) {
         checkMachineIsEmpty();
-        return complainOfEmptyMachine(model);
+        return complainOfEmptyMachine(source.model());
     }
-    const std::string start = "sensorctl " + command + (model ? " --model " + quoted(*model) : "");
+    const std::string start = "sensorctl " + command + option("--model", source.model()) +
+                              option("--provider", source.provider());
     std::vector<std::string> lines;
     for (const Sensor& sensor : found.choices)
         lines.push_back(

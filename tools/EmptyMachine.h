@@ -14,6 +14,8 @@
 
 namespace Tools {
 
+class SourceOptions;
+
 // Returns the number of the machine's sensors, counted without a provider. Throws
 // std::runtime_error with the reason when the machine cannot be read.
 // REQUIRES: no provider is loaded, since it may share libraries with this function.
@@ -33,8 +35,9 @@ std::vector<std::string> refusedSensors();
 ExitCode complainOfEmptyMachine(const std::optional<std::string>& model);
 
 // Writes to standard error why there is no object, with the command lines for sensors to choose
-// from. Calls checkMachineIsEmpty() where the machine has no sensors.
+// from, which repeat --model and --provider. Calls checkMachineIsEmpty() where the machine has no
+// sensors.
 ExitCode complainOfNoObject(
-    const ObjectFound& found, const std::string& command, const std::optional<std::string>& model);
+    const ObjectFound& found, const std::string& command, const SourceOptions& source);
 
 } // namespace Tools

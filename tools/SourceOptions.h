@@ -25,6 +25,7 @@ public:
     void addProvider(CLI::App& parser);
 
     const std::optional<std::string>& model() const { return model_; }
+    const std::optional<std::string>& provider() const { return provider_; }
 
     // Selects the model file for this process, if one is given. Throws std::runtime_error with the
     // file, the place in it and the reason when it is no model. REQUIRES: no provider is loaded,

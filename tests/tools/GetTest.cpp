@@ -113,6 +113,13 @@ TEST_F(GetTest, OffersTheChoicesOfAnAmbiguousNameAsLinesToCopy)
     EXPECT_THAT(run({"-c", command}, {.program = "/bin/sh"}).out, HasSubstr("/board/fan2\n"));
 }
 
+TEST_F(GetTest, ChoicesNameTheProviderThatWasGiven)
+{
+    const Ended ended = got("Fan", {"--provider", sensorLibrary});
+    EXPECT_THAT(linesOf(ended.err).back(),
+        testing::EndsWith(" --provider '" + sensorLibrary + "' 'Fan:/board/fan2'"));
+}
+
 TEST_F(GetTest, ChoicesAreQuotedForTheShell)
 {
     const std::string file = model(R"(

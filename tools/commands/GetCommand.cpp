@@ -49,7 +49,7 @@ public:
         const ObjectFound missing = show(out);
         if (missing.complaint.empty())
             return ExitCode::success;
-        return complainOfNoObject(missing, "get", source_.model());
+        return complainOfNoObject(missing, "get", source_);
     }
 
 private:

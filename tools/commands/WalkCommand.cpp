@@ -98,7 +98,7 @@ private:
     ExitCode complainOfNothing(const ObjectFound& root) const
     {
         if (wanted_)
-            return complainOfNoObject(root, "walk", source_.model());
+            return complainOfNoObject(root, "walk", source_);
         complain("there is no computer system");
         return ExitCode::nothingFound;
     }
