@@ -16,6 +16,7 @@
 
 #include <fcntl.h>
 #include <sys/file.h>
+#include <sys/types.h>
 #include <unistd.h>
 
 #include <algorithm>
@@ -34,6 +35,19 @@ namespace {
 using namespace Tools;
 
 using Period = std::chrono::steady_clock::duration;
+
+constexpr ::mode_t modeOfCollection =
+    0644; // whatever the umask: object managers run as other users
+
+// Makes the folder that all users may enter, unless there is one.
+void makeReadableFolder(const std::filesystem::path& folder)
+{
+    using std::filesystem::perms;
+    if (std::filesystem::create_directory(folder))
+        std::filesystem::permissions(folder, perms::owner_all | perms::group_read |
+                                                 perms::group_exec | perms::others_read |
+                                                 perms::others_exec);
+}
 
 // Keeps other collectors from the same file during its lifetime.
 class CollectionLock {
@@ -92,7 +106,7 @@ public:
             const Ipmi::IpmiDevice device; // throws where there is none, or none may be used
         }
         if (options_.file == Vorn::defaultCollection)
-            std::filesystem::create_directory(std::filesystem::path(options_.file).parent_path());
+            makeReadableFolder(std::filesystem::path(options_.file).parent_path());
         const CollectionLock lock(options_.file);
         period_ = interval();
         Ipmi::Collector collector({.readsDiscrete = has(discreteReading),
@@ -159,7 +173,8 @@ private:
         const Vorn::Renewal renewal{
             std::chrono::duration<double>(period_).count(), Vorn::secondsSinceStart()};
         const auto nodes = options_.isOnlyPresent ? collector.presentNodes() : collector.nodes();
-        replaceFile(options_.file, escapeUnprintable(Vorn::writeMachineFile({nodes, renewal})));
+        replaceFile(options_.file, escapeUnprintable(Vorn::writeMachineFile({nodes, renewal})),
+            modeOfCollection);
     }
 
     const CollectOptions& options_;

@@ -97,7 +97,7 @@ TEST_F(CollectSurroundingsTest, EverybodyCanReadTheFile)
 {
     if (::geteuid() != 0)
         return cannotRun("only root can run a command as nobody");
-    ::umask(022);
+    ::umask(077);
     collect();
     ::chmod(folder_.path().c_str(), 0755);
     const Ended ended =
