@@ -35,7 +35,7 @@ struct MetricFamily {
     std::string_view name; // that of a counter ends in "_total"
     std::string_view help;
     Type type = Type::gauge;
-    std::string_view unit = ""; // the end of the name, if it is a unit
+    std::string_view unit = {}; // the end of the name, if it is a unit
 };
 
 class Exposition {
