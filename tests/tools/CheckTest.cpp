@@ -58,7 +58,7 @@ TEST_F(CheckTest, ExitCodeFollowsTheStates)
 
 TEST_F(CheckTest, SeriesKeepTheirNamesInEverySelection)
 {
-    const std::string nodes[] = {
+    const std::vector<std::string> nodes = {
         R"({ "type": "tachometer", "path": "/b/fan1", "description": "Fan", "status": 1, "reading": 9 })",
         R"({ "type": "tachometer", "path": "/b/fan2", "description": "Fan", "status": 1, "reading": 8 })",
         R"({ "type": "tachometer", "path": "/c/fan1", "description": "Fan", "status": 1, "reading": 7 })"};
