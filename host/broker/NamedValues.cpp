@@ -15,9 +15,9 @@ std::uint64_t markOf(std::string_view name) noexcept
 {
     if (name.empty())
         return 1;
-    const auto first = static_cast<unsigned char>(foldCase(name.front()));
-    const auto last = static_cast<unsigned char>(foldCase(name.back()));
-    return std::uint64_t{1} << ((name.size() * 5 + first * 3U + last) % 64);
+    const std::size_t first = static_cast<unsigned char>(foldCase(name.front()));
+    const std::size_t last = static_cast<unsigned char>(foldCase(name.back()));
+    return std::uint64_t{1} << ((name.size() * 5 + first * 3 + last) % 64);
 }
 
 } // namespace

@@ -181,9 +181,7 @@ private:
     Period period_{};
 };
 
-} // namespace
-
-int main(int argc, char** argv)
+int collect(int argc, const char* const* argv)
 {
     CollectOptions options;
     CLI::App parser("Reads the sensors of the BMC", "sensorctl collect");
@@ -194,6 +192,15 @@ int main(int argc, char** argv)
         return EXIT_SUCCESS;
     } catch (const CLI::ParseError& error) {
         return parser.exit(error);
+    }
+}
+
+} // namespace
+
+int main(int argc, char** argv)
+{
+    try {
+        return collect(argc, argv);
     } catch (const std::exception& error) {
         complain(error.what());
         return EXIT_FAILURE;

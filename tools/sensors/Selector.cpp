@@ -58,7 +58,8 @@ std::string withPlainAddress(const std::string& chip)
     std::string_view digits = std::string_view(chip).substr(dash + 1);
     if (digits.starts_with("0x") || digits.starts_with("0X"))
         digits.remove_prefix(2);
-    if (digits.empty() || digits.find_first_not_of("0123456789abcdefABCDEF") != digits.npos)
+    if (digits.empty() ||
+        digits.find_first_not_of("0123456789abcdefABCDEF") != std::string_view::npos)
         return chip;
     const std::size_t zeros = std::min(digits.find_first_not_of('0'), digits.size() - 1);
     return chip.substr(0, dash + 1).append(digits.substr(zeros));
