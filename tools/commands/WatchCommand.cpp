@@ -107,15 +107,25 @@ private:
         printChanges(provider, out);
     }
 
-    // Throws std::runtime_error with the reason where the sensors cannot be read. There is no
-    // provider then, and the next call loads it again.
-    Sensors readSelected(std::optional<ProviderClient>& provider) const
+    Sensors readAll(std::optional<ProviderClient>& provider) const
     {
         if (provider)
             provider->beginRequest();
         else
             provider.emplace(source_.providerFiles());
-        Sensors all = readSensors(*provider, false);
+        return readSensors(*provider, false);
+    }
+
+    // Throws std::runtime_error with the reason where the sensors cannot be read. There is no
+    // provider then, and the next call loads it again.
+    Sensors readSelected(std::optional<ProviderClient>& provider) const
+    {
+        Sensors all = readAll(provider);
+        if (all.empty()) {
+            provider.reset();
+            if (countSensors() != 0) // the source may have recovered since
+                all = readAll(provider);
+        }
         if (all.empty()) {
             provider.reset();
             checkMachineIsEmpty();
