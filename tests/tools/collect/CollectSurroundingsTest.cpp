@@ -128,9 +128,13 @@ TEST_F(CollectSurroundingsTest, NobodyIsToldWhatIsNotPermitted)
 
 TEST_F(CollectSurroundingsTest, WithoutADeviceThereIsAnError)
 {
-    if (std::filesystem::exists("/dev/ipmi0"))
-        GTEST_SKIP() << "this machine has a BMC";
-    const Ended ended = Testing::run(arguments({}));
+    if (::geteuid() != 0)
+        return cannotRun("only root can mount a folder");
+    // An empty folder takes the place of /dev, since this machine may have a BMC.
+    std::filesystem::create_directory(folder_.path() / "dev");
+    const Ended ended =
+        runCommand(joined(inNamespace("/bin/mount --bind \"$0\" /dev", folder_.path() / "dev"),
+            joined({sensorctl}, arguments({}))));
     EXPECT_EQ(ended.code, 1);
     EXPECT_EQ(ended.err, "sensorctl: /dev/ipmi0: No such file or directory\n");
 }
