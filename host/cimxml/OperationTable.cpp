@@ -70,6 +70,11 @@ constexpr std::array<std::string_view, parameterCount> parameterNames = {"AssocC
 
 } // namespace
 
+std::span<const OperationForm> offeredOperations()
+{
+    return forms;
+}
+
 const OperationForm* findOperation(std::string_view name)
 {
     for (const OperationForm& form : forms)

@@ -9,6 +9,7 @@
 #include <concepts>
 #include <cstddef>
 #include <cstdint>
+#include <span>
 #include <string_view>
 
 namespace Host::CimXml {
@@ -66,6 +67,9 @@ struct OperationForm {
     ParameterSet optional;
     ParameterSet trueByDefault;
 };
+
+// Returns the operations that are offered.
+std::span<const OperationForm> offeredOperations();
 
 // Finds an operation by its name, in any letter case. Returns null for one that is not offered.
 const OperationForm* findOperation(std::string_view name);

@@ -16,12 +16,12 @@ namespace {
 
 using namespace Testing;
 
-const std::string data = SENSOR_PROFILE_SOURCE_DIR "/tests/data/tools/";
+const std::string screenData = SENSOR_PROFILE_SOURCE_DIR "/tests/data/tools/";
 
 std::string command(const std::string& locale)
 {
     return "env -u NO_COLOR LC_ALL=" + locale + " RYNLOG_LOG=off RYNLOG_TRACE=off " + sensorctl +
-           " watch --interval 3600 --model " + data + "tables.json";
+           " watch --interval 3600 --model " + screenData + "tables.json";
 }
 
 // Collects the screens that a terminal shows.
@@ -44,7 +44,7 @@ public:
     const std::string& seen() const { return seen_; }
 
 private:
-    std::string golden_ = contentOf(data + "screens.txt");
+    std::string golden_ = contentOf(screenData + "screens.txt");
     std::string seen_;
 };
 

@@ -4,6 +4,7 @@
 
 #include "host/cimxml/Message.h"
 #include "host/cimxml/OperationTable.h"
+#include "host/cimxml/RequestError.h"
 
 #include <array>
 
@@ -12,7 +13,8 @@ namespace Tools {
 namespace {
 
 constexpr MetricFamily requests{"sensor_profile_requests_total",
-    "CIM operations that were answered, by their result.", MetricFamily::Type::counter};
+    "CIM operations that were executed, by their result.", MetricFamily::Type::counter};
+constexpr std::string_view exception = "error"; // the result of an operation that threw one
 
 // The status codes of DSP0200, by their numbers.
 constexpr std::array<std::string_view, 30> statusNames = {"ok", "CIM_ERR_FAILED",
@@ -39,13 +41,32 @@ std::string_view operationOf(const Host::CimXml::Message& message)
 
 } // namespace
 
+// A counter that begins with its first request has no rate that includes it.
+RequestCounts::RequestCounts(Host::CimXml::OperationHandler& handler) : handler_(handler)
+{
+    for (const auto& form : Host::CimXml::offeredOperations())
+        counts_.try_emplace({form.name, statusNames.front()});
+}
+
 std::unique_ptr<Host::CimXml::Response> RequestCounts::answer(
     const Host::CimXml::Message& message, const Host::CimXml::Caller& caller)
 {
-    auto response = handler_.answer(message, caller);
+    try {
+        auto response = handler_.answer(message, caller);
+        count(operationOf(message), statusNames.at(response->status()));
+        return response;
+    } catch (const Host::CimXml::RequestError&) {
+        throw;
+    } catch (...) {
+        count(operationOf(message), exception);
+        throw;
+    }
+}
+
+void RequestCounts::count(std::string_view operation, std::string_view result)
+{
     const std::lock_guard lock(mutex_);
-    ++counts_[{operationOf(message), response->status()}];
-    return response;
+    ++counts_[{operation, result}];
 }
 
 void RequestCounts::addTo(Exposition& exposition) const
@@ -53,8 +74,7 @@ void RequestCounts::addTo(Exposition& exposition) const
     exposition.begin(requests);
     const std::lock_guard lock(mutex_);
     for (const auto& [key, count] : counts_)
-        exposition.add(
-            Labels().add("operation", key.first).add("result", statusNames.at(key.second)),
+        exposition.add(Labels().add("operation", key.first).add("result", key.second),
             static_cast<double>(count));
 }
 

@@ -17,19 +17,21 @@ namespace Tools {
 class RequestCounts : public Host::CimXml::OperationHandler {
 public:
     // The handler must outlive it.
-    explicit RequestCounts(Host::CimXml::OperationHandler& handler) : handler_(handler) {}
+    explicit RequestCounts(Host::CimXml::OperationHandler& handler);
 
-    // Throws what the handler throws; such messages are no operations and do not count.
+    // Throws what the handler throws. Messages that are not loosely valid do not count.
     std::unique_ptr<Host::CimXml::Response> answer(
         const Host::CimXml::Message& message, const Host::CimXml::Caller& caller) override;
 
     void addTo(Exposition& exposition) const;
 
 private:
+    void count(std::string_view operation, std::string_view result);
+
     Host::CimXml::OperationHandler& handler_;
     mutable std::mutex mutex_;
-    // By operation, in the spelling of DSP0200, and status code.
-    std::map<std::pair<std::string_view, unsigned>, std::uint64_t> counts_;
+    // By operation, in the spelling of DSP0200, and result.
+    std::map<std::pair<std::string_view, std::string_view>, std::uint64_t> counts_;
 };
 
 } // namespace Tools
