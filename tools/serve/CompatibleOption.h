@@ -9,10 +9,11 @@
 
 namespace Tools {
 
-// Adds --compatible, which sets the exporter whose metrics are added; there is one that is known.
+// Adds --compatible, which sets the exporter whose metrics are added.
 inline void addCompatible(CLI::App& parser, std::optional<std::string>& exporter)
 {
-    parser.add_option("--compatible", exporter, "Add the metrics of another one: node_exporter")
+    parser
+        .add_option("--compatible", exporter, "Add the metrics of another exporter: node_exporter")
         ->type_name("NAME")
         ->check(CLI::IsMember({"node_exporter"}).description(""));
 }
