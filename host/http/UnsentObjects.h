@@ -26,12 +26,23 @@ public:
     Share hold(std::size_t count)
     {
         const std::lock_guard lock(mutex_);
-        const bool areTooMany = held_ > 0 && count > 0 && held_ + count > maximum_;
+        const bool areTooMany = areTooManyWith(count);
         held_ += areTooMany ? 0 : count;
         return Share(areTooMany ? nullptr : this, Release{count});
     }
 
+    // Returns whether hold() would return a share now.
+    bool hasRoomFor(std::size_t count)
+    {
+        const std::lock_guard lock(mutex_);
+        return !areTooManyWith(count);
+    }
+
 private:
+    bool areTooManyWith(std::size_t count) const
+    {
+        return held_ > 0 && count > 0 && held_ + count > maximum_;
+    }
     void release(std::size_t count)
     {
         const std::lock_guard lock(mutex_);

@@ -45,6 +45,7 @@ TEST_F(MetricsResourceTest, TextThatClientsHaveYetToFetchIsBounded)
     } catch (const HttpError& error) {
         EXPECT_EQ(error.status(), 503U);
     }
+    EXPECT_EQ(harvestCount_, 2); // the third was refused without one
     first = {};
     EXPECT_GT(metrics.represent(head_).content->size(), large.size());
 }

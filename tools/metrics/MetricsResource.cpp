@@ -33,6 +33,12 @@ const char* contentTypeOf(ExpositionForm form)
                : "application/openmetrics-text; version=1.0.0; charset=utf-8";
 }
 
+Host::Http::HttpError tooMuchText()
+{
+    return Host::Http::HttpError::closing(
+        503, "clients have yet to fetch too much text", {{"Retry-After", "1"}});
+}
+
 } // namespace
 
 MetricsResource::MetricsResource(
@@ -52,6 +58,8 @@ Host::Http::Representation MetricsResource::represent(const Host::Http::RequestH
 
 std::shared_ptr<const MetricsResource::Text> MetricsResource::write(ExpositionForm form)
 {
+    if (!unsent_.hasRoomFor(latestSize_)) // before the sensors are read in vain
+        throw tooMuchText();
     Exposition exposition(form);
     auto harvest = harvests_.get();
     const std::size_t sensors = harvest->sensors.size();
@@ -62,10 +70,10 @@ std::shared_ptr<const MetricsResource::Text> MetricsResource::write(ExpositionFo
     addMore_(exposition);
     auto text = std::make_shared<Text>();
     text->content = std::move(exposition).finish();
+    latestSize_ = text->content.size();
     text->share = unsent_.hold(text->content.size());
     if (!text->share)
-        throw Host::Http::HttpError::closing(
-            503, "clients have yet to fetch too much text", {{"Retry-After", "1"}});
+        throw tooMuchText();
     return text;
 }
 

@@ -8,6 +8,8 @@
 #include "tools/sensors/Harvest.h"
 #include "tools/serve/SingleFlight.h"
 
+#include <atomic>
+#include <cstddef>
 #include <functional>
 #include <string>
 
@@ -35,6 +37,7 @@ private:
     SingleFlight<Harvest>& harvests_;
     const std::function<void(Exposition&)> addMore_;
     Host::Http::UnsentObjects unsent_;
+    std::atomic<std::size_t> latestSize_ = 0; // of a text, in bytes
     SingleFlight<Text> text_;
     SingleFlight<Text> openMetrics_;
 };
