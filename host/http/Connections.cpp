@@ -108,6 +108,8 @@ std::chrono::seconds Connections::timeoutOf(Phase phase) const
                                : limits_.requestTimeout;
     case Phase::answering:
         return limits_.answerTimeout;
+    case Phase::fetching:
+        return std::min(limits_.answerTimeout, limits_.requestTimeout);
     default:
         return limits_.idleTimeout + limits_.requestTimeout;
     }
@@ -175,7 +177,9 @@ std::vector<std::string> Connections::closeOverdue()
         if (connection.phase == Phase::working || connection.phase == Phase::waiting)
             continue;
         // libmicrohttpd overlooks an end that arrives together with the last bytes.
-        if (connection.phase != Phase::answering && hasClientFinished(connection.descriptor))
+        const bool isAnswered =
+            connection.phase == Phase::answering || connection.phase == Phase::fetching;
+        if (!isAnswered && hasClientFinished(connection.descriptor))
             ::shutdown(connection.descriptor, SHUT_RD);
         if (now < connection.deadline)
             continue;

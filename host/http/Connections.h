@@ -28,6 +28,7 @@ enum class Phase {
     working,   // the server works on it: no timeout counts
     waiting,   // its sign-in waits (see waitUntil): ends where the client closes the connection
     answering, // the client fetches the answer
+    fetching,  // the client fetches a resource
 };
 
 // An open connection. Connections owns it.

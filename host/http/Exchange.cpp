@@ -59,6 +59,7 @@ bool isLoopback(int descriptor)
 bool Exchange::begin(const RequestHead& head, std::size_t headSize)
 {
     try {
+        findResource(head);
         bodySize_ = bodySizeOf(head);
         if (headSize > service_.limits.maximumHeader)
             throw HttpError(MHD_HTTP_REQUEST_HEADER_FIELDS_TOO_LARGE,
@@ -74,17 +75,23 @@ bool Exchange::begin(const RequestHead& head, std::size_t headSize)
     return true;
 }
 
-void Exchange::checkRequest(const RequestHead& head)
+void Exchange::findResource(const RequestHead& head)
 {
     const auto found = service_.resources.find(pathOf(head));
-    if (found == service_.resources.end()) {
+    if (found == service_.resources.end())
+        return;
+    resource_ = &found->second.get();
+    resourceHead_ = head;
+}
+
+void Exchange::checkRequest(const RequestHead& head)
+{
+    if (resource_ == nullptr) {
         head_ = checkHead(head, bodySize_, service_.limits);
         return;
     }
     checkHost(head);
     checkResourceRequest(head, isLoopback(client_.descriptor));
-    resource_ = &found->second.get();
-    resourceHead_ = head;
 }
 
 void Exchange::signIn(const RequestHead& head)
@@ -150,8 +157,8 @@ bool Exchange::proceed(std::string_view piece)
     case State::discarding:
         if (piece.empty())
             return sendError();
-        discarded_ += piece.size();
-        return discarded_ <= 2 * service_.limits.maximumBody;
+        received_ += piece.size();
+        return received_ <= 2 * service_.limits.maximumBody;
     default:
         return false;
     }
@@ -159,11 +166,12 @@ bool Exchange::proceed(std::string_view piece)
 
 bool Exchange::receive(std::string_view piece)
 {
-    if (body_.size() + piece.size() <= service_.limits.maximumBody) {
-        body_.append(piece);
+    received_ += piece.size();
+    if (received_ <= service_.limits.maximumBody) {
+        if (resource_ == nullptr) // the content of a GET has no meaning (RFC 9110, 9.3.1)
+            body_.append(piece);
         return true;
     }
-    discarded_ = body_.size() + piece.size();
     error_.emplace(MHD_HTTP_CONTENT_TOO_LARGE,
         "a body holds at most " + std::to_string(service_.limits.maximumBody) + " bytes");
     body_ = {};
@@ -235,7 +243,7 @@ bool Exchange::sendAnswer()
         response.add(field);
     if (service_.connections.isShuttingDown())
         response.endConnection();
-    return send(response, MHD_HTTP_OK);
+    return send(response, MHD_HTTP_OK, Phase::answering);
 }
 
 bool Exchange::sendRepresentation()
@@ -245,7 +253,7 @@ bool Exchange::sendRepresentation()
         response.add(field);
     if (service_.connections.isShuttingDown())
         response.endConnection();
-    return send(response, MHD_HTTP_OK);
+    return send(response, MHD_HTTP_OK, Phase::fetching);
 }
 
 bool Exchange::sendError()
@@ -259,15 +267,17 @@ bool Exchange::sendError()
         response.add(field);
     if (error_->endsConnection() || service_.connections.isShuttingDown())
         response.endConnection();
-    return send(response, error_->status());
+    return send(response, error_->status(), Phase::answering);
 }
 
-bool Exchange::send(Response& response, unsigned status)
+bool Exchange::send(Response& response, unsigned status, Phase phase)
 {
+    if (service_.responses != nullptr)
+        service_.responses->add(status);
     if (areDetailsLogged())
         reportDetail({"send", "Exchange", __LINE__}, summary(status));
     state_ = State::answered;
-    enter(Phase::answering);
+    enter(phase);
     return response.queue(connection_, status);
 }
 

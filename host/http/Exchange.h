@@ -46,6 +46,7 @@ private:
         answered,
     };
 
+    void findResource(const RequestHead& head);
     void checkRequest(const RequestHead& head);
     void signIn(const RequestHead& head);
     bool isPasswordRight(const Credentials& credentials);
@@ -59,7 +60,7 @@ private:
     bool sendAnswer();
     bool sendRepresentation();
     bool sendError();
-    bool send(Response& response, unsigned status);
+    bool send(Response& response, unsigned status, Phase phase);
     std::string summary(unsigned status) const;
 
     Service& service_;
@@ -73,7 +74,7 @@ private:
     RequestHead resourceHead_;
     CimXml::Caller caller_;
     std::string body_;
-    std::size_t discarded_ = 0;
+    std::size_t received_ = 0; // bytes of the body
 
     std::optional<HttpError> error_;
 

@@ -26,7 +26,8 @@ struct Limits {
     std::size_t maximumUnsentObjects = 200'000;
 
     // How long a connection may transfer nothing in either direction, how long a request may take
-    // to arrive, and how long the client may take to fetch the answer.
+    // to arrive, and how long the client may take to fetch the answer. It may take no longer to
+    // fetch a resource than a request may to arrive.
     std::chrono::seconds idleTimeout{60};
     std::chrono::seconds requestTimeout{30};
     std::chrono::seconds answerTimeout{600};

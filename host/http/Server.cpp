@@ -11,9 +11,9 @@ namespace Host::Http {
 
 Server::Server(CimXml::OperationHandler& operations, std::vector<ListeningSocket> sockets,
     const Limits& limits, std::shared_ptr<const Certificate> certificate,
-    std::shared_ptr<const Passwords> passwords, Resources resources)
-    : service_(std::make_unique<Service>(
-          operations, std::move(resources), limits, std::move(certificate), std::move(passwords)))
+    std::shared_ptr<const Passwords> passwords, Resources resources, ResponseCounts* responses)
+    : service_(std::make_unique<Service>(operations, std::move(resources), limits,
+          std::move(certificate), std::move(passwords), responses))
 {
     for (ListeningSocket& socket : sockets)
         daemons_.emplace_back(*service_, std::move(socket));

@@ -18,6 +18,7 @@ namespace Host::Http {
 class Certificate;
 class Daemon;
 class Passwords;
+class ResponseCounts;
 struct Service;
 
 // Serves clients on threads of its own until it is destroyed. Installs no signal handlers; writes
@@ -25,11 +26,12 @@ struct Service;
 class Server {
 public:
     // An encrypted socket needs a certificate. Without passwords no client must sign in. The
-    // operations and the resources must outlive the server. Throws std::runtime_error and
-    // std::system_error when it cannot start.
+    // operations, the resources and the counts, to which it adds its responses, must outlive the
+    // server. Throws std::runtime_error and std::system_error when it cannot start.
     Server(CimXml::OperationHandler& operations, std::vector<ListeningSocket> sockets,
         const Limits& limits, std::shared_ptr<const Certificate> certificate = nullptr,
-        std::shared_ptr<const Passwords> passwords = nullptr, Resources resources = {});
+        std::shared_ptr<const Passwords> passwords = nullptr, Resources resources = {},
+        ResponseCounts* responses = nullptr);
     // Begins the shutdown and closes all connections, but blocks until the operations that run and
     // those in the queue have returned.
     ~Server();

@@ -7,6 +7,7 @@
 #include "host/http/Connections.h"
 #include "host/http/Limits.h"
 #include "host/http/Resource.h"
+#include "host/http/ResponseCounts.h"
 #include "host/http/SignIns.h"
 #include "host/http/UnsentObjects.h"
 #include "host/http/WorkSlots.h"
@@ -50,12 +51,12 @@ inline constexpr std::size_t maximumReaders = 32;
 struct Service {
     Service(CimXml::OperationHandler& handler, Resources given, const Limits& bounds,
         std::shared_ptr<const Certificate> firstCertificate,
-        std::shared_ptr<const Passwords> passwords)
+        std::shared_ptr<const Passwords> passwords, ResponseCounts* counts)
         : operations(handler), resources(std::move(given)), limits(bounds),
           certificate(std::move(firstCertificate)),
           signIns(std::move(passwords), limits.signInDelay), unsent(limits.maximumUnsentObjects),
           work(limits.workers, limits.maximumQueue), readers(maximumReaders, 0),
-          readersSigningIn(1, limits.maximumQueue)
+          readersSigningIn(1, limits.maximumQueue), responses(counts)
     {
     }
 
@@ -69,6 +70,7 @@ struct Service {
     // Those who read resources wait for no operation, and no operation waits for them.
     WorkSlots readers;
     WorkSlots readersSigningIn;
+    ResponseCounts* const responses; // may be null
     Connections connections{limits};
 };
 

@@ -197,6 +197,7 @@ TEST_F(MetricsTest, ServerGivesThoseOfTheCommandAndItsOwn)
     ask(HttpClient(server.port()), request("", "EnumerateInstances"));
     ask(HttpClient(server.port()), request("", "CreateEverything"));
     ask(HttpClient(server.port()), cimRequest("GetClass", cimClassParameter("No_Class")));
+    ask(HttpClient(server.port()), "GET /no-page HTTP/1.1\r\nHost: localhost\r\n\r\n");
     const HttpReply reply = ask(HttpClient(server.port()), get());
     EXPECT_EQ(reply.status, 200);
     EXPECT_EQ(reply.field("content-type"), "text/plain; version=0.0.4; charset=utf-8");
@@ -209,6 +210,9 @@ TEST_F(MetricsTest, ServerGivesThoseOfTheCommandAndItsOwn)
             Contains(requests + "\"EnumerateInstances\",result=\"ok\"} 1"),
             Contains(requests + "\"GetClass\",result=\"CIM_ERR_NOT_FOUND\"} 1"),
             Contains(requests + "\"other\",result=\"CIM_ERR_NOT_SUPPORTED\"} 1"),
+            Contains(requests + "\"PullInstancePaths\",result=\"ok\"} 0"),
+            Contains("sensor_profile_responses_total{code=\"200\"} 4"),
+            Contains("sensor_profile_responses_total{code=\"404\"} 1"),
             Contains("sensor_profile_held_objects 0")));
     const Ended ended =
         run({"-c", "promtool check metrics <" + folder_.write("metrics", reply.body)},

@@ -166,8 +166,10 @@ public:
         RequestCounts operations(memoryReturn);
         SingleFlight<Harvest> harvests(
             [&objects] { return std::make_shared<const Harvest>(readHarvest(objects.manager())); });
+        Host::Http::ResponseCounts responses;
         MetricsResource metrics(harvests, [&](Exposition& exposition) {
             operations.addTo(exposition);
+            addResponses(exposition, responses);
             addHeldObjects(exposition, objects.heldObjects());
             if (options_.compatible && SourceOptions::readsHwmon())
                 addHwmon(exposition);
@@ -178,7 +180,7 @@ public:
 
         const std::string text = greeting(sockets, protection.passwords() != nullptr);
         Host::Http::Server server(operations, std::move(sockets), options_.http,
-            protection.certificate(), protection.passwords(), {{"/metrics", metrics}});
+            protection.certificate(), protection.passwords(), {{"/metrics", metrics}}, &responses);
         out.write(text);
         out.flush();
         notifyServiceManager("READY=1");

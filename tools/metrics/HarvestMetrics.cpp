@@ -14,9 +14,11 @@ constexpr MetricFamily duration{"sensor_profile_harvest_duration_seconds",
     "Time that the harvest of these sensors took.", MetricFamily::Type::gauge, "seconds"};
 constexpr MetricFamily counts{"sensor_profile_sensors", "Number of sensors of the kind."};
 constexpr MetricFamily sources{"sensor_profile_source_up",
-    "Whether the source could be read and all its sensors are here: 1 if so, else 0."};
+    "1 when the source could be read and no sensor of it is missing, else 0."};
 constexpr MetricFamily held{"sensor_profile_held_objects",
     "Objects in the memory of the enumerations that CIM clients have open."};
+constexpr MetricFamily responses{"sensor_profile_responses_total",
+    "HTTP responses, by their status code.", MetricFamily::Type::counter};
 constexpr MetricFamily build{"sensor_profile_build_info", "Version of sensorctl; always 1."};
 
 } // namespace
@@ -35,6 +37,13 @@ void addHarvest(Exposition& exposition, const Harvest& harvest)
         exposition.add(Labels().add("source", source), isUp ? 1 : 0);
     exposition.begin(build);
     exposition.add(Labels().add("version", SENSOR_PROFILE_VERSION), 1);
+}
+
+void addResponses(Exposition& exposition, const Host::Http::ResponseCounts& counts)
+{
+    exposition.begin(responses);
+    for (const auto& [status, count] : counts.get())
+        exposition.add(Labels().add("code", std::to_string(status)), static_cast<double>(count));
 }
 
 void addHeldObjects(Exposition& exposition, std::size_t objects)

@@ -2,6 +2,7 @@
 
 #pragma once
 
+#include "host/http/ResponseCounts.h"
 #include "tools/metrics/Exposition.h"
 #include "tools/sensors/Harvest.h"
 
@@ -9,8 +10,12 @@
 
 namespace Tools {
 
-// Adds the sensors, what their harvest was like, and the version of the tool.
+// Adds the sensors, the duration of their harvest, the states of its sources, and the version of
+// the tool.
 void addHarvest(Exposition& exposition, const Harvest& harvest);
+
+// Adds the numbers of HTTP responses.
+void addResponses(Exposition& exposition, const Host::Http::ResponseCounts& counts);
 
 // Adds the number of objects in the memory of open enumerations.
 void addHeldObjects(Exposition& exposition, std::size_t objects);

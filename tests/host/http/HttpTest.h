@@ -9,6 +9,7 @@
 #include "host/http/ListenPolicy.h"
 #include "host/http/ListeningSocket.h"
 #include "host/http/Passwords.h"
+#include "host/http/ResponseCounts.h"
 #include "host/http/Server.h"
 #include "tests/support/CimCall.h"
 #include "tests/support/HttpClient.h"
@@ -129,7 +130,8 @@ protected:
     {
         auto sockets = Host::Http::listenOn(std::move(endpoints));
         port = sockets.front().address().port();
-        server.emplace(operations, std::move(sockets), limits, certificate, passwords, resources);
+        server.emplace(
+            operations, std::move(sockets), limits, certificate, passwords, resources, &responses);
     }
 
     HttpClient connect() const { return HttpClient(port); }
@@ -149,6 +151,7 @@ protected:
 
     StubOperations operations;
     Host::Http::Resources resources;
+    Host::Http::ResponseCounts responses;
     Host::Http::Limits limits;
     std::shared_ptr<const Host::Http::Certificate> certificate;
     std::shared_ptr<const Host::Http::Passwords> passwords;

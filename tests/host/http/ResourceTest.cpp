@@ -6,6 +6,7 @@
 #include "host/http/Service.h"
 #include "tests/host/http/Hashes.h"
 #include "tests/host/http/HttpTest.h"
+#include "tests/support/LogCapture.h"
 
 #include <unistd.h>
 
@@ -29,10 +30,11 @@ public:
         if (work)
             work();
         return {{{"Content-Type", "text/x-stub"}},
-            std::make_shared<const std::string>("content of " + head.target)};
+            std::make_shared<const std::string>("content of " + head.target + more)};
     }
 
     std::function<void()> work;
+    std::string more; // of the content
     std::atomic<int> calls{0};
 };
 
@@ -193,6 +195,48 @@ TEST_F(ResourceTest, TooManyReadersAtATimeAreRefused)
     goOn.set_value();
     for (HttpClient& each : readers)
         EXPECT_EQ(each.receive().status, 200);
+}
+
+TEST_F(ResourceTest, RefusalIsLoggedWithMethodAndTarget)
+{
+    const Testing::LogCapture log(4000);
+    start();
+    ask(get("Host: attacker.example\r\n"));
+    ask(get("Host: localhost\r\nContent-Length: 0\r\n", "/stub", "PUT"));
+    ask(get(""));
+    std::vector<std::string> texts;
+    for (const Testing::LogLine& line : log.log())
+        texts.push_back(line.text);
+    EXPECT_THAT(texts, testing::ElementsAre(testing::StartsWith("421 to 127.0.0.1, GET /stub: "),
+                           testing::StartsWith("405 to 127.0.0.1, PUT /stub: "),
+                           testing::StartsWith("400 to 127.0.0.1, GET /stub: ")));
+}
+
+TEST_F(ResourceTest, ResponsesAreCountedByTheirStatus)
+{
+    demandPassword();
+    start();
+    ask(get());
+    ask(post());
+    ask(get("Host: localhost\r\n" + asAnn));
+    ask(post(asAnn));
+    stub.work = [] { throw std::runtime_error("broken"); };
+    ask(get("Host: localhost\r\n" + asAnn));
+    EXPECT_EQ(responses.get(), (std::map<unsigned, std::uint64_t>{{200, 2}, {401, 2}, {500, 1}}));
+}
+
+TEST_F(ResourceTest, MustBeFetchedInTheTimeOfARequest)
+{
+    using std::chrono::steady_clock;
+    limits.requestTimeout = std::chrono::seconds(1);
+    stub.more = std::string(std::size_t{16} << 20, 'x'); // more than the sockets take
+    start();
+    HttpClient client = connect();
+    const auto begin = steady_clock::now();
+    client.send(get());
+    ASSERT_TRUE(client.hasReplyWithin(HttpClient::timeout));
+    EXPECT_TRUE(server->waitUntilIdle(std::chrono::seconds(20)));
+    EXPECT_LT(steady_clock::now() - begin, std::chrono::seconds(20));
 }
 
 TEST_F(ResourceTest, FailureIsAnswered)
