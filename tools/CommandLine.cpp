@@ -3,7 +3,6 @@
 #include "tools/CommandLine.h"
 
 #include "tools/Command.h"
-#include "tools/EmptyMachine.h"
 #include "tools/LibraryLog.h"
 #include "tools/UsageError.h"
 #include "tools/commands/Commands.h"
@@ -88,8 +87,6 @@ ExitCode runCommand(Command& command, Output& out)
         const ExitCode code = command.run(out);
         out.flush();
         log.printMessages("");
-        for (const std::string& message : refusedSensors())
-            complain(message);
         return code;
     } catch (const UsageError&) {
         throw;

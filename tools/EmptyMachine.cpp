@@ -14,28 +14,6 @@ using Vorn::NodeLexicon::NodeType;
 
 namespace {
 
-struct Look {
-    std::size_t count = 0;
-    // The path of the first sensor of a type without a description, which no provider accepts. It
-    // publishes no sensor of the type after it.
-    std::vector<std::string> nameless;
-};
-
-Look lookAtMachine()
-{
-    Look look;
-    for (const NodeType type : {NodeType::Temperature, NodeType::Voltage, NodeType::Tachometer}) {
-        Vorn::Instrumentation cursor;
-        bool isComplete = true;
-        for (cursor.selectNode(type); cursor; ++cursor, ++look.count)
-            if (isComplete && cursor.getNodeDescription().empty()) {
-                look.nameless.push_back(cursor.convertPathToString(cursor.getPathToNode()));
-                isComplete = false;
-            }
-    }
-    return look;
-}
-
 // Returns the text as a word of the shell.
 std::string quoted(const std::string& text)
 {
@@ -54,28 +32,20 @@ std::string option(const std::string& name, const std::optional<std::string>& va
 
 std::size_t countSensors()
 {
-    return lookAtMachine().count;
+    std::size_t count = 0;
+    for (const NodeType type : {NodeType::Temperature, NodeType::Voltage, NodeType::Tachometer}) {
+        Vorn::Instrumentation cursor;
+        for (cursor.selectNode(type); cursor; ++cursor)
+            ++count;
+    }
+    return count;
 }
 
 void checkMachineIsEmpty()
 {
-    const Look look = lookAtMachine();
-    if (look.count == 0)
-        return;
-    const std::string reason =
-        look.nameless.empty() ? "" : ": " + look.nameless.front() + " has no description";
-    throw std::runtime_error("the machine has " + std::to_string(look.count) +
-                             " sensors, of which the provider shows none" + reason);
-}
-
-std::vector<std::string> refusedSensors()
-{
-    std::vector<std::string> messages;
-    if (!SourceOptions::readsHwmon())
-        for (const std::string& path : lookAtMachine().nameless)
-            messages.push_back(path + " has no description: it is left out, and so are the sensors "
-                                      "of its kind after it");
-    return messages;
+    if (const std::size_t count = countSensors(); count != 0)
+        throw std::runtime_error("the machine has " + std::to_string(count) +
+                                 " sensors, of which the provider shows none");
 }
 
 ExitCode complainOfEmptyMachine(const std::optional<std::string>& model)

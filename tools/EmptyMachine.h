@@ -10,7 +10,6 @@
 #include <cstddef>
 #include <optional>
 #include <string>
-#include <vector>
 
 namespace Tools {
 
@@ -25,11 +24,6 @@ std::size_t countSensors();
 // an empty answer in that case as well as for a machine without sensors.
 // REQUIRES: no provider is loaded.
 void checkMachineIsEmpty();
-
-// Returns a message for each sensor without a description, where the machine is one of model files:
-// no provider publishes it. REQUIRES: no provider is loaded, and SourceOptions::selectMachine() was
-// called.
-std::vector<std::string> refusedSensors();
 
 // Writes to standard error that the machine, or the model file, has no sensors.
 ExitCode complainOfEmptyMachine(const std::optional<std::string>& model);

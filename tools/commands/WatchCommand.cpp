@@ -90,7 +90,6 @@ public:
 private:
     ExitCode watch(Output& out)
     {
-        const std::vector<std::string> refused = refusedSensors();
         std::optional<ProviderClient> provider(std::in_place, source_.providerFiles());
         const Sensors all = readSensors(*provider, false);
         isMachineEmpty_ = all.empty();
@@ -102,8 +101,6 @@ private:
             return ExitCode::nothingFound;
         if (isScreen())
             return showScreen(provider);
-        for (const std::string& message : refused)
-            complain(message);
         printChanges(provider, out);
     }
 

@@ -4,6 +4,7 @@
 
 #include "platform/instrumentation/NodeStatus.h"
 #include "platform/instrumentation/machinefile/MachineFileCache.h"
+#include "platform/text/Trim.h"
 
 namespace Vorn {
 
@@ -15,6 +16,12 @@ bool isOfReadings(unsigned status)
 {
     using namespace NodeStatus;
     return status == normal || (status >= warning && status <= criticalHigh);
+}
+
+// Returns a name for a sensor without a description, which would end the harvest of its type.
+std::string nameOf(const std::string& path)
+{
+    return "Sensor " + path.substr(path.starts_with('/') ? 1 : 0);
 }
 
 } // namespace
@@ -29,8 +36,11 @@ std::vector<Node> MachineFileSource::nodes(NodeLexicon::NodeType type)
     std::vector<Node> found;
     for (std::size_t index = 0; index < file_->nodes.size(); ++index) {
         const MachineFileNode& node = file_->nodes[index];
-        if (node.type == type)
-            found.push_back({node.path, node.description, node.sensorType, index});
+        if (node.type != type)
+            continue;
+        const bool isNameless = Text::trimmed(node.description).empty();
+        found.push_back(
+            {node.path, isNameless ? nameOf(node.path) : node.description, node.sensorType, index});
     }
     return found;
 }

@@ -59,7 +59,7 @@ TEST_F(MachineFileSourceTest, IsServedInItsOwnOrder)
 {
     write(R"({"nodes":[
         {"type":"voltage","path":"/1","description":"first","reading":3.25},
-        {"type":"tachometer","path":"/2","description":"","status":1},
+        {"type":"tachometer","path":"/2","description":"third","status":1},
         {"type":"voltage","path":"/3","description":"second","sensorType":7}]})");
     const auto nodes = walk();
     ASSERT_THAT(nodes, SizeIs(3));
@@ -69,7 +69,20 @@ TEST_F(MachineFileSourceTest, IsServedInItsOwnOrder)
     EXPECT_EQ(nodes[1].path, "/3");
     EXPECT_EQ(nodes[1].sensorType, 7U);
     EXPECT_EQ(nodes[2].path, "/2");
-    EXPECT_EQ(nodes[2].description, "");
+    EXPECT_EQ(nodes[2].values.status, 13U);
+}
+
+TEST_F(MachineFileSourceTest, ANodeWithoutADescriptionIsNamedAfterItsPath)
+{
+    write(R"({"nodes":[
+        {"type":"voltage","path":"/board/in1","description":""},
+        {"type":"voltage","path":"in2","description":" \t"},
+        {"type":"voltage","path":"","description":""}]})");
+    const auto nodes = walk();
+    ASSERT_THAT(nodes, SizeIs(3));
+    EXPECT_EQ(nodes[0].description, "Sensor board/in1");
+    EXPECT_EQ(nodes[1].description, "Sensor in2");
+    EXPECT_EQ(nodes[2].description, "Sensor ");
 }
 
 TEST_F(MachineFileSourceTest, ANodeWithoutAReadingIsNeverNormal)
