@@ -67,6 +67,21 @@ std::string SourceOptions::ageOfCollection()
     return "";
 }
 
+std::vector<std::string> SourceOptions::failuresOfCollections()
+{
+    std::vector<std::string> failures;
+    for (const Vorn::SourceEntry& entry : sources()) {
+        if (entry.scheme != "ipmi")
+            continue;
+        try {
+            const Vorn::IpmiSource source(entry.argument);
+        } catch (const std::exception& error) {
+            failures.emplace_back(error.what());
+        }
+    }
+    return failures;
+}
+
 ProviderFiles SourceOptions::providerFiles() const
 {
     // The loader would search its own folders for a name without a slash.

@@ -43,6 +43,10 @@ public:
     // empty text where the machine has none, or where they cannot be read.
     static std::string ageOfCollection();
 
+    // Returns the reasons why sensors of management controllers cannot be read. The provider
+    // publishes the others then.
+    static std::vector<std::string> failuresOfCollections();
+
     // Throws std::runtime_error when no library is given and none is found.
     ProviderFiles providerFiles() const;
 

@@ -98,6 +98,32 @@ TEST_F(CheckTest, RangesReplaceTheSensorsOwnLimits)
     EXPECT_EQ(checked({"fan2", "--warning", "fan=100:", "--critical", "fan=50:"}).code, 1);
 }
 
+TEST_F(CheckTest, AFileOfTheManagementControllerThatCannotBeReadIsUnknown)
+{
+    const std::string missing = (folder_.path() / "missing.json").string();
+    const std::string broken = folder_.write("broken.json", "{");
+    const std::string undated = folder_.write("undated.json", R"({"nodes":[]})");
+    const auto checkedWith = [&](const std::string& collection, const std::string& selector) {
+        const std::string sources = "model:" + smallModel() + ",ipmi:" + collection;
+        return run({"check", selector}, {.environment = {{"VORN_INSTRUMENTATION", sources}}});
+    };
+    EXPECT_EQ(checkedWith(missing, "cpu0").code, 0);
+    for (const auto& [file, reason] : {std::pair(broken, "line 1, column 2: "),
+             {undated, "it does not say when the sensors were read"}}) {
+        const Ended ended = checkedWith(file, "cpu0");
+        EXPECT_EQ(ended.code, 3);
+        EXPECT_THAT(ended.out, StartsWith("SENSORS UNKNOWN - model file " + file + ": " + reason));
+        EXPECT_THAT(ended.out, HasSubstr(" - 1 sensor: 1 normal. | 'cpu0/CPU 1'="));
+    }
+    const Ended critical = checkedWith(broken, "cpu1");
+    EXPECT_EQ(critical.code, 2);
+    EXPECT_THAT(critical.out, HasSubstr(", model file " + broken + ": line 1, column 2: "));
+    const Ended alone =
+        run({"check"}, {.environment = {{"VORN_INSTRUMENTATION", "ipmi:" + broken}}});
+    EXPECT_EQ(alone.code, 3);
+    EXPECT_THAT(alone.out, StartsWith("SENSORS UNKNOWN - model file " + broken));
+}
+
 TEST_F(CheckTest, HelpSaysWhatSilencesASensor)
 {
     EXPECT_THAT(run({"check", "--help"}).out, HasSubstr("silence a sensor, give both options"));

@@ -83,6 +83,8 @@ public:
                 if (std::none_of(all.begin(), all.end(),
                         [&](const Sensor& sensor) { return selects(each.selector, sensor); }))
                     report.add(CheckStatus::unknown, nothingMatches(each.selector, all));
+        for (const std::string& failure : SourceOptions::failuresOfCollections())
+            report.add(CheckStatus::unknown, failure);
         if (all.empty())
             report.add(CheckStatus::unknown, "this machine has no sensors");
         else
