@@ -109,6 +109,50 @@ TEST_F(FileReplacementTest, DoesNotReplaceADevice)
     EXPECT_TRUE(std::filesystem::is_character_file("/dev/null"));
 }
 
+TEST_F(FileReplacementTest, RenewedFileCanBeReadByEverybody)
+{
+    const mode_t mask = ::umask(077);
+    for (const std::string content : {"first", "second"}) {
+        Tools::renewFile(path("renewed"), content);
+        EXPECT_EQ(contentOf(path("renewed")), content);
+    }
+    ::umask(mask);
+    struct stat status {};
+    ::stat(path("renewed").c_str(), &status);
+    EXPECT_EQ(status.st_mode & 07777U, 0644U);
+    EXPECT_EQ(files(), 1U);
+}
+
+TEST_F(FileReplacementTest, RenewalRemovesWhatAnEndedProcessLeft)
+{
+    const std::string file = folder_.write("renewed", "before");
+    folder_.write("other", "other");
+    for (int turn = 0; turn < 2; ++turn) { // a link is not followed
+        if (turn == 0)
+            folder_.write("renewed.new", "half a");
+        else
+            std::filesystem::create_symlink("other", path("renewed.new"));
+        Tools::prepareRenewal(file);
+        EXPECT_EQ(files(), 2U);
+        EXPECT_EQ(contentOf(file), "before");
+    }
+    folder_.write("renewed.new", "half a");
+    Tools::renewFile(file, "after");
+    EXPECT_EQ(contentOf(file), "after");
+    EXPECT_EQ(contentOf(path("other")), "other");
+    EXPECT_EQ(files(), 2U);
+}
+
+TEST_F(FileReplacementTest, NamesTheFileThatCannotBeRenewed)
+{
+    const std::string file = path("missing/renewed");
+    EXPECT_EQ(Testing::errorOf([&] { Tools::prepareRenewal(file); }),
+        file + ": No such file or directory");
+    EXPECT_NO_THROW(Tools::prepareRenewal("/dev/full"));
+    EXPECT_EQ(Testing::errorOf([] { Tools::renewFile("/dev/full", "x"); }),
+        "/dev/full: No space left on device");
+}
+
 TEST_F(FileReplacementTest, NamesAFolderAndAnEmptyPath)
 {
     EXPECT_EQ(

@@ -165,17 +165,24 @@ void Collector::readSensor(Bmc& bmc, std::size_t index)
     const SensorAnswer answer = interpret(
         request(bmc, sensor, CommandCode::getSensorReading), workarounds_.ignoresScanning);
     const bool hasReading = answer.kind == Kind::reading;
+    const bool hasThresholds = sensor.record.eventType == thresholdEvents;
     if (hasReading)
         readBefore_.insert(address);
     sensor.isAbsent = answer.kind == Kind::unavailable && !readBefore_.contains(address);
     values.reading = hasReading ? valueOf(bmc, sensor, answer.raw) : std::nullopt;
+    // The time between the pulses of a fan that stands has no reciprocal. Only the alarm tells it
+    // from a time that was not measured.
+    const bool isSlowFan = hasReading && hasThresholds && isLow(answer.crossed.value_or(0)) &&
+                           sensor.kind.type == Vorn::NodeLexicon::NodeType::Tachometer;
+    if (!values.reading && isSlowFan && sensor.record.linearization == reciprocal)
+        values.reading = 0;
     if (sensor.isAbsent)
         values.status = NodeStatus::noContact;
     else if (answer.kind == Kind::disabled)
         values.status = NodeStatus::disabled;
     else if (!values.reading)
         values.status = NodeStatus::lostCommunication;
-    else if (sensor.record.eventType != thresholdEvents)
+    else if (!hasThresholds)
         values.status = NodeStatus::normal; // the bits of a discrete sensor are not thresholds
     else
         values.status =

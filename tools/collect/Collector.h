@@ -38,9 +38,6 @@ public:
     // Makes all nodes sensors that have lost communication.
     void loseAll();
 
-    // Returns whether the records of the BMC have been read.
-    bool knowsSensors() const { return !repository_.empty(); }
-
     const std::vector<Vorn::MachineFileNode>& nodes() const { return nodes_; }
 
     // Returns the nodes without those of sensors that are unavailable and have never been read.

@@ -37,6 +37,7 @@ Factors factorsOf(std::span<const std::uint8_t, factorBytes> bytes);
 // raw reading.
 using Linearization = std::uint8_t;
 inline constexpr Linearization linear = 0;
+inline constexpr Linearization reciprocal = 7;
 
 // Returns whether the code is reserved: nothing is known of the number then.
 constexpr bool isReserved(Linearization code)

@@ -6,12 +6,14 @@
 
 #include <fcntl.h>
 #include <poll.h>
+#include <sys/file.h>
 #include <sys/ioctl.h>
-#include <unistd.h>
 
 #include <algorithm>
 #include <array>
 #include <cerrno>
+#include <stdexcept>
+#include <string>
 #include <system_error>
 
 namespace Ipmi {
@@ -23,6 +25,14 @@ using std::chrono::milliseconds;
 [[noreturn]] void fail()
 {
     throw std::system_error(errno, std::generic_category(), devicePath);
+}
+
+Vorn::Descriptor openDevice()
+{
+    Vorn::Descriptor file(::open(devicePath, O_RDWR | O_CLOEXEC));
+    if (!file.isOpen())
+        fail();
+    return file;
 }
 
 // Waits until there is something to read. Returns false at the end of the timeout.
@@ -39,16 +49,7 @@ bool waitForInput(int file, milliseconds timeout)
 
 } // namespace
 
-IpmiDevice::IpmiDevice() : file_(::open(devicePath, O_RDWR | O_CLOEXEC))
-{
-    if (file_ < 0)
-        fail();
-}
-
-IpmiDevice::~IpmiDevice()
-{
-    ::close(file_);
-}
+IpmiDevice::IpmiDevice() : file_(openDevice()) {}
 
 Bytes IpmiDevice::send(const Command& command, milliseconds timeout)
 {
@@ -59,7 +60,7 @@ Bytes IpmiDevice::send(const Command& command, milliseconds timeout)
         const auto left = std::chrono::ceil<milliseconds>(end - std::chrono::steady_clock::now());
         if (left <= milliseconds::zero())
             return {};
-        if (waitForInput(file_, left))
+        if (waitForInput(file_.number(), left))
             if (Bytes answer = receive(); !answer.empty())
                 return answer;
     }
@@ -90,7 +91,7 @@ bool IpmiDevice::submit(const Command& command, milliseconds timeout)
     // The kernel repeats a message that is lost between the BMC and a satellite.
     request.retries = 1;
     request.retry_time_ms = static_cast<unsigned>(timeout.count()) / 2;
-    if (::ioctl(file_, IPMICTL_SEND_COMMAND_SETTIME, &request) == 0)
+    if (::ioctl(file_.number(), IPMICTL_SEND_COMMAND_SETTIME, &request) == 0)
         return true;
     if (responder.isBmc || (errno != EINVAL && errno != EAGAIN))
         fail();
@@ -108,7 +109,7 @@ Bytes IpmiDevice::receive()
     received.msg.data = data.data();
     received.msg.data_len = data.size();
     // A message that is too long is received without its end.
-    if (::ioctl(file_, IPMICTL_RECEIVE_MSG_TRUNC, &received) != 0 && errno != EMSGSIZE) {
+    if (::ioctl(file_.number(), IPMICTL_RECEIVE_MSG_TRUNC, &received) != 0 && errno != EMSGSIZE) {
         if (errno == EAGAIN || errno == EINTR)
             return {};
         fail();
@@ -117,6 +118,16 @@ Bytes IpmiDevice::receive()
         return {};
     const std::size_t size = std::min<std::size_t>(received.msg.data_len, data.size());
     return {data.begin(), data.begin() + size};
+}
+
+IpmiDeviceLock::IpmiDeviceLock() : file_(openDevice())
+{
+    if (::flock(file_.number(), LOCK_EX | LOCK_NB) == 0)
+        return;
+    if (errno == EWOULDBLOCK)
+        throw std::runtime_error(
+            std::string("another process reads the sensors of ") + devicePath + " already");
+    fail();
 }
 
 } // namespace Ipmi

@@ -2,6 +2,7 @@
 
 #pragma once
 
+#include "platform/instrumentation/Descriptor.h"
 #include "tools/collect/Transport.h"
 
 namespace Ipmi {
@@ -14,9 +15,6 @@ class IpmiDevice final : public Transport {
 public:
     // Throws std::system_error naming the device.
     IpmiDevice();
-    ~IpmiDevice() override;
-    IpmiDevice(const IpmiDevice&) = delete;
-    IpmiDevice& operator=(const IpmiDevice&) = delete;
 
     Bytes send(const Command& command, std::chrono::milliseconds timeout) override;
 
@@ -24,8 +22,20 @@ private:
     bool submit(const Command& command, std::chrono::milliseconds timeout);
     Bytes receive();
 
-    int file_;
+    Vorn::Descriptor file_;
     long lastMessage_ = 0; // its number distinguishes an answer from late ones
+};
+
+// Keeps other collectors from the device during its lifetime: each of them would cost the BMC as
+// many commands.
+class IpmiDeviceLock {
+public:
+    // Throws std::system_error naming the device, and std::runtime_error when another process has
+    // the lock.
+    IpmiDeviceLock();
+
+private:
+    Vorn::Descriptor file_;
 };
 
 } // namespace Ipmi

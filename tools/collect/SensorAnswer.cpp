@@ -49,6 +49,11 @@ ThresholdMask crossedBy(double reading, const Limits& limits)
     return crossed;
 }
 
+bool isLow(const ThresholdMask& crossed)
+{
+    return crossed[lowerNonCritical] || crossed[lowerCritical] || crossed[lowerNonRecoverable];
+}
+
 unsigned statusOf(const ThresholdMask& crossed)
 {
     if (crossed[upperNonRecoverable] || crossed[upperCritical])

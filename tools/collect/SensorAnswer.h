@@ -42,6 +42,9 @@ SensorAnswer interpret(std::span<const std::uint8_t> answer, bool ignoresScannin
 // Returns the thresholds that the reading is at or beyond.
 ThresholdMask crossedBy(double reading, const Limits& limits);
 
+// Returns whether the reading is at or below a threshold.
+bool isLow(const ThresholdMask& crossed);
+
 // Returns the status of a sensor with a reading. Those of critical and non-recoverable thresholds
 // precede those of non-critical ones, upper thresholds precede lower ones.
 unsigned statusOf(const ThresholdMask& crossed);

@@ -14,19 +14,12 @@
 
 #include <CLI/CLI.hpp>
 
-#include <fcntl.h>
-#include <sys/file.h>
-#include <sys/types.h>
-#include <unistd.h>
-
 #include <algorithm>
-#include <cerrno>
 #include <chrono>
 #include <cstdlib>
 #include <filesystem>
-#include <stdexcept>
+#include <optional>
 #include <string>
-#include <system_error>
 #include <thread>
 #include <utility>
 
@@ -35,9 +28,6 @@ namespace {
 using namespace Tools;
 
 using Period = std::chrono::steady_clock::duration;
-
-constexpr ::mode_t modeOfCollection =
-    0644; // whatever the umask: object managers run as other users
 
 // Makes the folder that all users may enter, unless there is one.
 void makeReadableFolder(const std::filesystem::path& folder)
@@ -49,33 +39,6 @@ void makeReadableFolder(const std::filesystem::path& folder)
                                                  perms::others_exec);
 }
 
-// Keeps other collectors from the same file during its lifetime.
-class CollectionLock {
-public:
-    // Throws std::runtime_error when another process has the lock, or when there can be none. The
-    // file of the lock is never removed: a process that has just opened it could lock nothing then.
-    explicit CollectionLock(const std::string& collection)
-    {
-        const std::string path = collection + ".lock";
-        file_ = ::open(path.c_str(), O_RDWR | O_CREAT | O_CLOEXEC | O_NOFOLLOW, 0600);
-        if (file_ < 0)
-            throw std::system_error(errno, std::generic_category(), path);
-        if (::flock(file_, LOCK_EX | LOCK_NB) == 0)
-            return;
-        const int error = errno;
-        ::close(file_);
-        if (error == EWOULDBLOCK)
-            throw std::runtime_error("another process renews " + collection + " already");
-        throw std::system_error(error, std::generic_category(), path);
-    }
-    ~CollectionLock() { ::close(file_); }
-    CollectionLock(const CollectionLock&) = delete;
-    CollectionLock& operator=(const CollectionLock&) = delete;
-
-private:
-    int file_;
-};
-
 // Reports a problem to standard error when it begins and when it is over.
 class Condition {
 public:
@@ -84,9 +47,13 @@ public:
     // An empty problem is none.
     void report(const std::string& problem)
     {
-        if (problem != reported_)
-            complain(problem.empty() ? good_ : problem);
+        if (problem == reported_)
+            return;
         reported_ = problem;
+        if (problem.empty())
+            inform(good_);
+        else
+            complain(problem);
     }
 
 private:
@@ -102,12 +69,10 @@ public:
     // Writes the file once, or again and again. Throws std::exception where it cannot begin.
     void run()
     {
-        {
-            const Ipmi::IpmiDevice device; // throws where there is none, or none may be used
-        }
+        const Ipmi::IpmiDeviceLock lock;
         if (options_.file == Vorn::defaultCollection)
             makeReadableFolder(std::filesystem::path(options_.file).parent_path());
-        const CollectionLock lock(options_.file);
+        prepareRenewal(options_.file);
         period_ = interval();
         Ipmi::Collector collector({.readsDiscrete = has(discreteReading),
             .ignoresScanning = has(ignoreScanningDisabled),
@@ -159,26 +124,27 @@ private:
         // The device is opened for each pass, since the kernel may have removed it meanwhile.
         Ipmi::IpmiDevice device;
         collector.pass(device, period_);
+        readAt_ = Vorn::secondsSinceStart();
         period_ =
             std::max<Period>(interval(), shareOfTime * (std::chrono::steady_clock::now() - begin));
     }
 
     Period interval() const { return std::chrono::seconds(options_.interval); }
 
-    // Does nothing before the sensors are known: a file of an earlier process says which there are.
+    // Does nothing before the sensors have been read: a file of an earlier process says which there
+    // are.
     void write(const Ipmi::Collector& collector)
     {
-        if (!collector.knowsSensors())
+        if (!readAt_)
             return;
-        const Vorn::Renewal renewal{
-            std::chrono::duration<double>(period_).count(), Vorn::secondsSinceStart()};
+        const Vorn::Renewal renewal{std::chrono::duration<double>(period_).count(), *readAt_};
         const auto nodes = options_.isOnlyPresent ? collector.presentNodes() : collector.nodes();
-        replaceFile(options_.file, escapeUnprintable(Vorn::writeMachineFile({nodes, renewal})),
-            modeOfCollection);
+        renewFile(options_.file, escapeUnprintable(Vorn::writeMachineFile({nodes, renewal})));
     }
 
     const CollectOptions& options_;
     Period period_{};
+    std::optional<double> readAt_; // the end of the last pass that the BMC answered
 };
 
 int collect(int argc, const char* const* argv)

@@ -56,6 +56,11 @@ public:
         : target_(target), name_(target + ".XXXXXX"), file_(::mkstemp(name_.data()))
     {
     }
+    // Replaces a file of that name, too.
+    Replacement(const std::string& target, const std::string& name)
+        : target_(target), name_(name), file_(openNew(name))
+    {
+    }
     ~Replacement()
     {
         if (!isDone_)
@@ -75,6 +80,12 @@ public:
     }
 
 private:
+    static int openNew(const std::string& name)
+    {
+        ::unlink(name.c_str());
+        return ::open(name.c_str(), O_WRONLY | O_CREAT | O_EXCL | O_CLOEXEC, 0600);
+    }
+
     std::string target_;
     std::string name_;
     Descriptor file_;
@@ -95,23 +106,62 @@ void writeInPlace(const std::string& path, std::string_view content)
     file.close();
 }
 
-} // namespace
-
-void replaceFile(const std::string& path, std::string_view content, std::optional<::mode_t> mode)
+// Calls the action with the target of a path and its type and mode, which are absent where there is
+// nothing. Throws std::runtime_error with the path and the reason.
+template <typename Action>
+void onTarget(const std::string& path, const Action& action)
 {
     try {
         const std::string target = std::filesystem::weakly_canonical(path).string();
         struct stat status {};
         const bool exists = ::stat(target.c_str(), &status) == 0;
-        if (exists && !S_ISREG(status.st_mode))
-            writeInPlace(target, content);
-        else
-            Replacement(target).write(content, mode     ? *mode
-                                               : exists ? status.st_mode & 07777
-                                                        : modeOfNewFiles());
+        action(target, exists ? std::optional(status.st_mode) : std::nullopt);
     } catch (const std::system_error& error) {
         throw std::runtime_error(path + ": " + error.code().message());
     }
+}
+
+bool isReplaceable(const std::optional<::mode_t>& present)
+{
+    return !present || S_ISREG(*present);
+}
+
+std::string renewalOf(const std::string& target)
+{
+    return target + ".new";
+}
+
+} // namespace
+
+void replaceFile(const std::string& path, std::string_view content, std::optional<::mode_t> mode)
+{
+    onTarget(path, [&](const std::string& target, const std::optional<::mode_t>& present) {
+        if (!isReplaceable(present))
+            writeInPlace(target, content);
+        else
+            Replacement(target).write(content, mode      ? *mode
+                                               : present ? *present & 07777
+                                                         : modeOfNewFiles());
+    });
+}
+
+void renewFile(const std::string& path, std::string_view content)
+{
+    constexpr ::mode_t mode = 0644; // whatever the umask
+    onTarget(path, [&](const std::string& target, const std::optional<::mode_t>& present) {
+        if (!isReplaceable(present))
+            writeInPlace(target, content);
+        else
+            Replacement(target, renewalOf(target)).write(content, mode);
+    });
+}
+
+void prepareRenewal(const std::string& path)
+{
+    onTarget(path, [&](const std::string& target, const std::optional<::mode_t>& present) {
+        if (isReplaceable(present))
+            const Replacement removed(target, renewalOf(target));
+    });
 }
 
 } // namespace Tools

@@ -19,4 +19,12 @@ namespace Tools {
 void replaceFile(
     const std::string& path, std::string_view content, std::optional<::mode_t> mode = std::nullopt);
 
+// Does so for a file that this process renews again and again, and which every user can read. The
+// new file is PATH.new. REQUIRES: no other process does so with the same file.
+void renewFile(const std::string& path, std::string_view content);
+
+// Removes the PATH.new of a process that was ended while it wrote. Throws std::runtime_error with
+// the file and the reason where renewFile() could not make another one.
+void prepareRenewal(const std::string& path);
+
 } // namespace Tools

@@ -20,6 +20,21 @@ namespace {
 
 constexpr std::size_t pieceSize = std::size_t{1} << 16;
 
+// Writes a message with the priority of sd-daemon(3).
+void writeMessage(
+    const char* priority, std::string_view text, const std::vector<std::string>& lines) noexcept
+{
+    try {
+        std::string message = RynLog::isStandardErrorTheJournal() ? priority : "";
+        message += "sensorctl: " + printable(text, isUtf8Locale()) + "\n";
+        for (const std::string& line : lines)
+            message += "  " + printable(line, isUtf8Locale()) + "\n";
+        writeAll(STDERR_FILENO, message);
+    } catch (const std::exception&) {
+        // There is nowhere left to report it.
+    }
+}
+
 } // namespace
 
 void reserveStandardStreams()
@@ -63,15 +78,12 @@ void Output::flush()
 
 void complain(std::string_view text, const std::vector<std::string>& lines) noexcept
 {
-    try {
-        std::string message = RynLog::isStandardErrorTheJournal() ? "<3>" : "";
-        message += "sensorctl: " + printable(text, isUtf8Locale()) + "\n";
-        for (const std::string& line : lines)
-            message += "  " + printable(line, isUtf8Locale()) + "\n";
-        writeAll(STDERR_FILENO, message);
-    } catch (const std::exception&) {
-        // There is nowhere left to report it.
-    }
+    writeMessage("<3>", text, lines);
+}
+
+void inform(std::string_view text) noexcept
+{
+    writeMessage("<6>", text, {});
 }
 
 } // namespace Tools

@@ -35,7 +35,10 @@ private:
 };
 
 // Writes `sensorctl: <text>` and the further lines, which are indented, to standard error, with
-// unprintable characters escaped. Ignores failures.
+// unprintable characters escaped, and to the journal as an error. Ignores failures.
 void complain(std::string_view text, const std::vector<std::string>& lines = {}) noexcept;
+
+// Writes a text in the same way, to the journal as mere information.
+void inform(std::string_view text) noexcept;
 
 } // namespace Tools

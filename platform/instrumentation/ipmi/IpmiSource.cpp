@@ -34,7 +34,8 @@ IpmiSource::IpmiSource(const std::string& named)
         throw;
     }
     if (!file_->renewal())
-        throw std::runtime_error("model file " + path + ": it does not say when it was written");
+        throw std::runtime_error(
+            "model file " + path + ": it does not say when the sensors were read");
 }
 
 std::vector<Node> IpmiSource::nodes(NodeLexicon::NodeType type)

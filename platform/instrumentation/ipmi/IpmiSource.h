@@ -17,9 +17,10 @@ inline constexpr const char* defaultCollection = "/run/sensor-profile/ipmi.json"
 // jump when its clock is set.
 double secondsSinceStart();
 
-// Serves the sensors of a management controller from the file that another process renews. When the
-// file is older than three of its periods, every sensor has lost communication; its limits and
-// possible states stay. Without the file there are no nodes: most machines have no such controller.
+// Serves the sensors of a management controller from the file that another process renews. When
+// they were read more than three of its periods ago, every sensor has lost communication; its
+// limits and possible states stay. Without the file there are no nodes: most machines have no such
+// controller.
 class IpmiSource final : public Source {
 public:
     // An empty path is that of the default. Throws std::runtime_error naming the file, the place in
@@ -29,7 +30,7 @@ public:
     std::vector<Node> nodes(NodeLexicon::NodeType type) override;
     NodeReading read(const Node& node) override;
 
-    // Returns how many seconds ago the file was written; nothing without a file.
+    // Returns how many seconds ago the sensors were read; nothing without a file.
     std::optional<double> age() const;
 
 private:

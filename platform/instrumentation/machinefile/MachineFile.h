@@ -9,11 +9,11 @@
 
 namespace Vorn {
 
-// When a process wrote a file that it renews again and again. Times are seconds since the machine
-// started, which also pass while it is suspended and do not jump when its clock is set.
+// Of a file that a process renews again and again. Times are seconds since the machine started,
+// which also pass while it is suspended and do not jump when its clock is set.
 struct Renewal {
-    double period = 0; // in seconds
-    double time = 0;
+    double period = 0; // from one reading of the sensors to the next, in seconds
+    double time = 0;   // when the sensors were read
 
     bool operator==(const Renewal&) const = default;
 };

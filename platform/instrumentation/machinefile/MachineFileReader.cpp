@@ -321,6 +321,8 @@ MachineFile readMachineFile(std::string_view text)
     requireMember(members, document, Member::nodes);
     if (period.has_value() != time.has_value())
         requireMember(members, document, period ? Member::time : Member::period);
+    if (period && *period <= 0)
+        fail({&document, Member::period}, "the period is not above 0");
     if (period)
         file.renewal = {*period, *time};
     return file;

@@ -20,7 +20,7 @@ public:
     std::vector<Node> nodes(NodeLexicon::NodeType type) override;
     NodeReading read(const Node& node) override;
 
-    // Returns when the file was written, if a process renews it.
+    // Returns when the sensors were read, if a process renews the file.
     const std::optional<Renewal>& renewal() const { return file_->renewal; }
 
 private:

@@ -90,7 +90,7 @@ TEST_F(IpmiSourceTest, AFileThatCannotBeUsedIsReportedOnceAndTakesNoOtherSensors
         EXPECT_THAT(walk(), SizeIs(1));
     ASSERT_THAT(capture.log(), SizeIs(1));
     EXPECT_THAT(capture.log().at(0).text,
-        AllOf(HasSubstr(file()), HasSubstr("does not say when it was written")));
+        AllOf(HasSubstr(file()), HasSubstr("does not say when the sensors were read")));
     folder_.write("ipmi.json", "{");
     EXPECT_THAT(walk(), SizeIs(1));
     EXPECT_THAT(capture.log(), SizeIs(2));
@@ -119,7 +119,9 @@ TEST_F(IpmiSourceTest, TheTimeOfAFileIsReadAsItWasWritten)
         {R"({"nodes":[],"time":1,"time":1})", "/time: the member is there twice"},
         {R"({"period":1,"time":1})", "the document: member \"nodes\" is missing"},
         {R"({"nodes":[],"period":"1","time":1})",
-            "/period: expected a number, found the string \"1\""}};
+            "/period: expected a number, found the string \"1\""},
+        {R"({"nodes":[],"period":0,"time":1})", "/period: the period is not above 0"},
+        {R"({"nodes":[],"period":-1.5,"time":1})", "/period: the period is not above 0"}};
     for (const auto& [document, error] : documents)
         EXPECT_EQ(Testing::errorOf([&text = document] { Vorn::readMachineFile(text); }), error);
 }

@@ -74,6 +74,7 @@ TEST(SchemaTest, NumbersAreTheNumbersOfTheReader)
         }
     });
     EXPECT_EQ(schema().at("/$defs/code/maximum"_json_pointer), 4294967295U);
+    EXPECT_EQ(schema().at("/properties/period/exclusiveMinimum"_json_pointer), 0);
 }
 
 // The status of each sensor agrees with its reading and limits.

@@ -3,8 +3,10 @@
 // Preloaded into a reader of /dev/ipmi0, it connects the device to the system interface of ipmi_sim
 // at the loopback port SIMULATED_BMC. Each command takes SIMULATED_BMC_DELAY milliseconds more. As
 // the kernel does, it bridges commands to satellites by Send Message and Get Message (IPMI 2.0,
-// sections 22.6 and 22.7), and the device of a BMC that is gone opens and stays silent. Where
-// SIMULATED_CLOCK_JUMPS is set, the clock of the day jumps back by an hour each time it is read.
+// sections 22.6 and 22.7), and the device of a BMC that is gone opens and stays silent. Commands to
+// satellites fail with the error number SIMULATED_SATELLITE_ERROR. A lock of the device is a name
+// that one socket at a time can have. Where SIMULATED_CLOCK_JUMPS is set, the clock of the day
+// jumps back by an hour each time it is read.
 
 #include <arpa/inet.h>
 #include <linux/ipmi.h>
@@ -12,6 +14,7 @@
 #include <sys/ioctl.h>
 #include <sys/socket.h>
 #include <sys/syscall.h>
+#include <sys/un.h>
 
 #include <dlfcn.h>
 #include <fcntl.h>
@@ -23,6 +26,7 @@
 #include <array>
 #include <cerrno>
 #include <cstdarg>
+#include <cstddef>
 #include <cstdint>
 #include <cstdlib>
 #include <cstring>
@@ -114,8 +118,21 @@ std::optional<Bytes> receive()
     return std::nullopt;
 }
 
-void submit(const ipmi_req& request)
+bool isForSatellite(const ipmi_req& request)
 {
+    int type = 0;
+    std::memcpy(&type, request.addr, sizeof type);
+    return type == IPMI_IPMB_ADDR_TYPE;
+}
+
+// Returns what ioctl() does.
+int submit(const ipmi_req& request)
+{
+    const char* const error = std::getenv("SIMULATED_SATELLITE_ERROR");
+    if (error != nullptr && isForSatellite(request)) {
+        errno = std::atoi(error);
+        return -1;
+    }
     Request sent{request.msgid, request.msg.netfn, request.msg.cmd};
     const Bytes data(request.msg.data, request.msg.data + request.msg.data_len);
     ipmi_addr address{};
@@ -124,7 +141,7 @@ void submit(const ipmi_req& request)
         ipmi_system_interface_addr bmc{};
         std::memcpy(&bmc, &address, sizeof bmc);
         send(sent, bmc.lun, sent.netFunction, sent.command, data);
-        return;
+        return 0;
     }
     ipmi_ipmb_addr satellite{};
     std::memcpy(&satellite, &address, sizeof satellite);
@@ -141,6 +158,7 @@ void submit(const ipmi_req& request)
     message.insert(message.end(), data.begin(), data.end());
     message.push_back(checksum(message, second));
     send(sent, 0, application, sendMessage, message);
+    return 0;
 }
 
 struct Answer {
@@ -215,6 +233,23 @@ int openDevice(const char* port)
     return device.socket;
 }
 
+// Binds a socket to a name in the place of the device, which this closes.
+int lockDevice()
+{
+    sockaddr_un name{};
+    name.sun_family = AF_UNIX;
+    const std::string text = std::string("simulated-bmc-") + std::getenv("SIMULATED_BMC");
+    text.copy(name.sun_path + 1, text.size()); // an abstract name begins with NUL
+    const auto size = static_cast<socklen_t>(offsetof(sockaddr_un, sun_path) + 1 + text.size());
+    const int lock = ::socket(AF_UNIX, SOCK_DGRAM | SOCK_CLOEXEC, 0);
+    const int result = ::bind(lock, reinterpret_cast<const sockaddr*>(&name), size);
+    ::dup3(lock, device.socket, O_CLOEXEC);
+    ::close(lock);
+    device.socket = -1;
+    errno = EWOULDBLOCK;
+    return result;
+}
+
 template <typename Function>
 Function next(const char* name)
 {
@@ -270,15 +305,23 @@ EXPORTED int ioctl(int file, unsigned long request, ...) noexcept
         return next<int (*)(int, unsigned long, ...)>("ioctl")(file, request, argument);
     switch (request) {
     case IPMICTL_SEND_COMMAND:
-        submit(*static_cast<const ipmi_req*>(argument));
-        return 0;
+        return submit(*static_cast<const ipmi_req*>(argument));
     case IPMICTL_SEND_COMMAND_SETTIME:
-        submit(static_cast<const ipmi_req_settime*>(argument)->req);
-        return 0;
+        return submit(static_cast<const ipmi_req_settime*>(argument)->req);
     case IPMICTL_RECEIVE_MSG:
     case IPMICTL_RECEIVE_MSG_TRUNC:
         return deliver(*static_cast<ipmi_recv*>(argument));
     default:
         return 0;
     }
+}
+
+// <fcntl.h> has a type of the name, too, which the function would hide.
+EXPORTED int lockFile(int file, int operation) noexcept __asm__("flock");
+
+int lockFile(int file, int operation) noexcept
+{
+    if (file < 0 || file != device.socket)
+        return next<int (*)(int, int)>("flock")(file, operation);
+    return lockDevice();
 }

@@ -4,6 +4,7 @@
 
 #include <array>
 #include <cstdio>
+#include <stdexcept>
 #include <string_view>
 #include <utility>
 
@@ -273,6 +274,17 @@ std::string recordOf(const SimulatedSensor& sensor)
     record += std::string{2, 2, 0, 0, 0} + sensor.idString;
     record[4] = byte(static_cast<int>(record.size()) - 5);
     return record;
+}
+
+int recordIdOf(const std::string& description)
+{
+    int id = 6; // follows the records that are no sensors of the server
+    for (const SimulatedSensor& sensor : simulatedServer()) {
+        if (sensor.description == description)
+            return id;
+        ++id;
+    }
+    throw std::out_of_range(description);
 }
 
 std::string additionOf(const std::string& record)

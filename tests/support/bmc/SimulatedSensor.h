@@ -69,6 +69,9 @@ std::string pathOf(const SimulatedSensor& sensor);
 // Returns the full sensor record.
 std::string recordOf(const SimulatedSensor& sensor);
 
+// Returns the identifier that ipmi_sim gives the record of a sensor of the simulated server.
+int recordIdOf(const std::string& description);
+
 // Returns the commands by which ipmi_sim makes such a machine.
 std::string emulationOf(const std::vector<SimulatedSensor>& sensors);
 

@@ -1,7 +1,7 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Other readers of the same controller, where they are right: they do not decode all names, convert
-// no units, and do not show the limits of each sensor.
+// Other readers of the same controller, where they are right: they do not decode all names and
+// convert no units.
 
 #include "tests/tools/collect/CollectTest.h"
 
@@ -38,6 +38,13 @@ const MachineFileNode* named(const MachineFile& file, const std::string& name)
     return node == file.nodes.end() ? nullptr : &*node;
 }
 
+// Returns the limits by increasing threshold.
+std::array<std::optional<double>, 6> limitsOf(const NodeReading& values)
+{
+    return {values.lowerFatal, values.lowerCritical, values.lowerNonCritical,
+        values.upperNonCritical, values.upperCritical, values.upperFatal};
+}
+
 class CollectOracleTest : public Testing::CollectTest {
 protected:
     // Returns the lines of another reader, in cells.
@@ -52,23 +59,45 @@ protected:
     }
 };
 
-void expectStatus(const NodeReading& values, const std::string& state)
+// What ipmitool says of a sensor, by the words before the colons.
+using Fields = std::map<std::string, std::string>;
+
+// Returns the fields of each sensor.
+std::vector<Fields> fieldsIn(const std::vector<Cells>& lines)
 {
-    const std::map<std::string, std::set<unsigned>> statuses = {
-        {"ok", {1}}, {"nc", {22, 23}}, {"cr", {25, 26}}, {"nr", {25, 26}}, {"na", {13, 16, 17}}};
-    EXPECT_TRUE(statuses.at(state).contains(values.status)) << values.status;
+    std::vector<Fields> sensors;
+    for (const Cells& line : lines) {
+        if (line.size() < 2)
+            continue;
+        if (line[0] == "Sensor ID") // such as "CPU1 Temp (0x1)"
+            sensors.push_back({{line[0], line[1].substr(0, line[1].rfind(" ("))}});
+        else if (!sensors.empty())
+            sensors.back().insert({line[0], line[1]});
+    }
+    return sensors;
+}
+
+void expectStatus(unsigned status, const std::string& words)
+{
+    const std::map<std::string, std::set<unsigned>> statuses = {{"ok", {1}},
+        {"Lower Non-Critical", {22}}, {"Upper Non-Critical", {23}}, {"Lower Critical", {25}},
+        {"Lower Non-Recoverable", {25}}, {"Upper Critical", {26}}, {"Upper Non-Recoverable", {26}},
+        {"Not Available", {13, 16, 17}}};
+    EXPECT_TRUE(statuses.at(words).contains(status)) << status << ", but " << words;
 }
 
 // Returns how many limits were compared.
-std::size_t expectLimits(const NodeReading& values, std::span<const std::string> cells)
+std::size_t expectLimits(const NodeReading& values, const Fields& fields)
 {
-    const std::array limits = {values.lowerFatal, values.lowerCritical, values.lowerNonCritical,
-        values.upperNonCritical, values.upperCritical, values.upperFatal};
+    constexpr std::array names = {"Lower non-recoverable", "Lower critical", "Lower non-critical",
+        "Upper non-critical", "Upper critical", "Upper non-recoverable"};
     std::size_t compared = 0;
-    for (std::size_t at = 0; at < limits.size(); ++at) {
-        if (cells[at] == "na")
+    for (std::size_t at = 0; at < names.size(); ++at) {
+        const auto limit = fields.find(names.at(at));
+        if (limit == fields.end())
             continue;
-        expectNumber(limits.at(at), std::stod(cells[at]));
+        SCOPED_TRACE(limit->first);
+        expectNumber(limitsOf(values).at(at), std::stod(limit->second));
         ++compared;
     }
     return compared;
@@ -79,19 +108,21 @@ TEST_F(CollectOracleTest, IpmitoolHasTheSameReadingsStatesAndLimits)
     const MachineFile file = collect();
     std::size_t readings = 0;
     std::size_t limits = 0;
-    for (const Cells& cells : linesOf("/usr/bin/ipmitool", {"-I", "open", "sensor"}, '|')) {
-        ASSERT_EQ(cells.size(), 10U);
-        const MachineFileNode* const node = named(file, cells[0]);
-        const std::string& unit = cells[2];
+    for (Fields& fields :
+        fieldsIn(linesOf("/usr/bin/ipmitool", {"-I", "open", "-v", "sdr"}, ':'))) {
+        const MachineFileNode* const node = named(file, fields["Sensor ID"]);
+        const std::string& reading = fields["Sensor Reading"]; // such as "58 (+/- 0) degrees C"
+        const std::string unit = reading.substr(std::min(reading.find(") "), reading.size()));
         if (node == nullptr ||
-            (!unit.empty() && unit != "degrees C" && unit != "Volts" && unit != "RPM"))
+            (!unit.empty() && unit != ") degrees C" && unit != ") Volts" && unit != ") RPM"))
             continue;
-        SCOPED_TRACE(cells[0]);
-        expectNumber(node->values.reading,
-            cells[1] == "na" ? std::nullopt : std::optional(std::stod(cells[1])));
-        expectStatus(node->values, cells[3]);
+        SCOPED_TRACE(node->description);
+        expectNumber(
+            node->values.reading, unit.empty() ? std::nullopt : std::optional(std::stod(reading)));
+        expectStatus(node->values.status, fields["Status"]);
         ++readings;
-        limits += expectLimits(node->values, std::span(cells).subspan<4, 6>());
+        if (node->description != "P3V3") // has other limits than its record, which ipmitool shows
+            limits += expectLimits(node->values, fields);
     }
     EXPECT_GT(readings, 35U);
     EXPECT_GT(limits, 60U);
@@ -108,31 +139,48 @@ unsigned statusOf(unsigned long events)
     return (events & 0x01U) != 0 ? 22 : 1;
 }
 
-TEST_F(CollectOracleTest, IpmiSensorsHasTheSameReadingsAndStates)
+void expectNear(const std::optional<double>& seen, const std::string& cell)
+{
+    constexpr double rounding = 0.0051; // two decimals
+    ASSERT_EQ(seen.has_value(), cell != "N/A");
+    if (seen) {
+        EXPECT_NEAR(*seen, std::stod(cell), rounding);
+    }
+}
+
+// Its limits are those of another sensor where a sensor is not the BMC's at its logical unit 0, and
+// it ends at a sensor that has limits in its record only.
+TEST_F(CollectOracleTest, IpmiSensorsHasTheSameReadingsStatesAndLimits)
 {
     const MachineFile file = collect();
-    std::size_t compared = 0;
+    std::size_t readings = 0;
+    std::size_t limited = 0;
     for (const Cells& cells : linesOf("/usr/sbin/ipmi-sensors",
              {"-D", "OPENIPMI", "--sdr-cache-directory=" + folder_.path().string(), "--quiet-cache",
                  "--comma-separated-output", "--no-header-output", "--bridge-sensors",
-                 "--output-event-bitmask"},
+                 "--output-event-bitmask", "--output-sensor-thresholds",
+                 "--exclude-record-ids=" + std::to_string(Testing::recordIdOf("Ghost Temp"))},
              ',')) {
-        ASSERT_GE(cells.size(), 6U);
+        ASSERT_EQ(cells.size(), 12U);
         const MachineFileNode* const node = named(file, cells[1]);
         const std::string& unit = cells[4];
         if (node == nullptr || (unit != "C" && unit != "V" && unit != "RPM"))
             continue;
         SCOPED_TRACE(cells[1]);
         const NodeReading& values = node->values;
-        ++compared;
-        ASSERT_EQ(values.reading.has_value(), cells[3] != "N/A");
-        if (!values.reading)
+        ++readings;
+        expectNear(values.reading, cells[3]);
+        if (values.reading) {
+            EXPECT_EQ(values.status, statusOf(std::stoul(cells[11], nullptr, 16)));
+        }
+        if (!node->path.starts_with("/ipmi/20/0/"))
             continue;
-        constexpr double rounding = 0.0051; // two decimals
-        EXPECT_NEAR(*values.reading, std::stod(cells[3]), rounding);
-        EXPECT_EQ(values.status, statusOf(std::stoul(cells[5], nullptr, 16)));
+        ++limited;
+        for (std::size_t at = 0; at < limitsOf(values).size(); ++at)
+            expectNear(limitsOf(values).at(at), cells[5 + at]);
     }
-    EXPECT_GT(compared, 35U);
+    EXPECT_GT(readings, 35U);
+    EXPECT_GT(limited, 30U);
 }
 
 } // namespace CollectOracleTests

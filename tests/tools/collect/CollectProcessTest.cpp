@@ -4,6 +4,10 @@
 
 #include "tests/tools/collect/CollectProcessTest.h"
 
+#include "tests/support/ErrorOf.h"
+
+#include <sys/stat.h>
+
 #include <algorithm>
 
 namespace CollectProcessTests {
@@ -22,17 +26,26 @@ bool isLost(const MachineFileNode& node)
 
 TEST_F(CollectProcessTest, AControllerThatFallsSilentLosesAllSensorsUntilItAnswers)
 {
-    start();
+    const std::string log = folder_.write("err", "");
+    struct stat status {};
+    ::stat(log.c_str(), &status);
+    start(
+        {{"JOURNAL_STREAM", std::to_string(status.st_dev) + ":" + std::to_string(status.st_ino)}});
     const MachineFile before = collected();
     const auto begin = std::chrono::steady_clock::now();
     bmc_.suspend();
+    const double suspended = Vorn::secondsSinceStart();
     ASSERT_TRUE(waitForStatus("CPU1 Temp", 13)) << errors();
     EXPECT_LT(std::chrono::steady_clock::now() - begin, std::chrono::seconds(10));
     const MachineFile silent = collected();
     EXPECT_TRUE(std::all_of(silent.nodes.begin(), silent.nodes.end(), isLost));
     ASSERT_EQ(silent.nodes.size(), before.nodes.size());
     EXPECT_EQ(nodeOf(silent, "CPU1 Temp").values.upperFatal, 100);
-    EXPECT_TRUE(waitUntil([this] { return errors() == "sensorctl: the BMC does not answer\n"; }));
+    EXPECT_TRUE(
+        waitUntil([this] { return errors() == "<3>sensorctl: the BMC does not answer\n"; }));
+    // The time remains that of the last readings.
+    EXPECT_LE(silent.renewal.value().time, suspended);
+    EXPECT_THAT(listed("--color=never"), testing::ContainsRegex("ipmi +\\(read [4-9] s ago\\)\n"));
 
     bmc_.resume();
     ASSERT_TRUE(waitForStatus("CPU1 Temp", 1)) << errors();
@@ -40,7 +53,30 @@ TEST_F(CollectProcessTest, AControllerThatFallsSilentLosesAllSensorsUntilItAnswe
     // A sensor that has never been read is not one that was lost.
     EXPECT_EQ(nodeOf(collected(), "NVMe Temp").values.status, 17);
     EXPECT_TRUE(waitUntil(
-        [this] { return errors().ends_with("sensorctl: the sensors are read again\n"); }));
+        [this] { return errors().ends_with("\n<6>sensorctl: the sensors are read again\n"); }));
+}
+
+TEST_F(CollectProcessTest, ASensorAtWhichTheControllerFallsSilentLosesTheOthersForOnePassOnly)
+{
+    start();
+    bmc_.setFaults(fault(numberOf("CPU1 Temp"), "drop"));
+    ASSERT_TRUE(waitForStatus("GPU Temp", 13)) << errors();
+    ASSERT_TRUE(waitForStatus("GPU Temp", 26)) << errors();
+    EXPECT_TRUE(isLost(nodeOf(collected(), "CPU1 Temp")));
+    EXPECT_EQ(nodeOf(collected(), "CPU2 Temp").values.reading, 88);
+    EXPECT_EQ(nodeOf(collected(), "CPU1 Temp").values.upperFatal, 100);
+}
+
+TEST_F(CollectProcessTest, ASatelliteThatIsSwitchedOffIsReadAgainWhenItIsOn)
+{
+    start();
+    bmc_.command("mc_disable 0x2c");
+    ASSERT_TRUE(waitForStatus("ME Temp", 13)) << errors();
+    EXPECT_EQ(nodeOf(collected(), "CPU1 Temp").values.reading, 58);
+    bmc_.command("mc_enable 0x2c");
+    ASSERT_TRUE(waitForStatus("ME Temp", 1)) << errors();
+    EXPECT_EQ(nodeOf(collected(), "ME Temp").values.reading, 51);
+    EXPECT_EQ(errors(), "");
 }
 
 TEST_F(CollectProcessTest, AControllerThatRestartsInTheMiddleOfAPassIsReadAgain)
@@ -76,8 +112,7 @@ TEST_F(CollectProcessTest, AnAddedRecordIsAnotherSensor)
     std::string addition = Testing::additionOf(Testing::recordOf(added));
     addition.pop_back();
     bmc_.command(addition);
-    ASSERT_TRUE(waitUntil([this] {
-        const MachineFile file = collected();
+    ASSERT_TRUE(waitForFile([](const MachineFile& file) {
         const MachineFileNode* const node = Testing::findNode(file, "/ipmi/20/0/200");
         return node != nullptr && node->values.reading == 33;
     })) << Testing::contentOf(file());
@@ -90,19 +125,37 @@ TEST_F(CollectProcessTest, ChangedThresholdsAreReadInTurn)
     ASSERT_EQ(nodeOf(collected(), name).values.upperCritical, 42);
     bmc_.command("sensor_set_threshold 0x20 0 " + std::to_string(numberOf(name)) +
                  " settable 011011 0 45 40 0 0xf9 3");
-    EXPECT_TRUE(waitUntil([&] { return nodeOf(collected(), name).values.upperCritical == 45; }));
+    EXPECT_TRUE(waitForFile(
+        [&](const MachineFile& file) { return nodeOf(file, name).values.upperCritical == 45; }));
     EXPECT_EQ(nodeOf(collected(), name).values.upperNonCritical, 40);
 }
 
 TEST_F(CollectProcessTest, ASecondProcessSaysThatThereIsOne)
 {
     start();
-    const Testing::Ended second =
-        Testing::run(arguments({"--once"}), {.environment = bmc_.environment()});
-    EXPECT_EQ(second.code, 1);
-    EXPECT_EQ(second.err, "sensorctl: another process renews " + file() + " already\n");
+    const std::string renewed = file();
+    for (const std::string& name : {renewed, renewed + ".other"}) {
+        file_ = name;
+        const Testing::Ended second =
+            Testing::run(arguments({"--once"}), {.environment = bmc_.environment()});
+        EXPECT_EQ(second.code, 1);
+        EXPECT_EQ(
+            second.err, "sensorctl: another process reads the sensors of /dev/ipmi0 already\n");
+    }
+    EXPECT_FALSE(std::filesystem::exists(file()));
     kill();
     EXPECT_NO_THROW(collect());
+}
+
+TEST_F(CollectProcessTest, WhatAnEndedProcessLeftIsRemoved)
+{
+    folder_.write("ipmi.json.new", "{");
+    collect();
+    EXPECT_FALSE(std::filesystem::exists(file() + ".new"));
+
+    file_ = folder_.path() / "missing/ipmi.json";
+    EXPECT_EQ(Testing::errorOf([this] { collect(); }),
+        "sensorctl: " + file() + ": No such file or directory\n");
 }
 
 TEST_F(CollectProcessTest, TheProviderPublishesItsSensorsUntilThreePeriodsAfterItsEnd)

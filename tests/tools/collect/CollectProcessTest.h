@@ -14,6 +14,7 @@
 
 #include <map>
 #include <string>
+#include <utility>
 #include <vector>
 
 namespace Testing {
@@ -58,9 +59,22 @@ protected:
 
     std::string errors() const { return contentOf(folder_.path() / "err"); }
 
+    // Waits for a file that fulfils the condition. Each is read once.
+    template <typename Condition>
+    bool waitForFile(const Condition& holds) const
+    {
+        std::filesystem::file_time_type seen;
+        return waitUntil([&] {
+            const auto written = std::filesystem::last_write_time(file());
+            return std::exchange(seen, written) != written && holds(collected());
+        });
+    }
+
     bool waitForStatus(const std::string& description, unsigned status) const
     {
-        return waitUntil([&] { return nodeOf(collected(), description).values.status == status; });
+        return waitForFile([&](const Vorn::MachineFile& file) {
+            return nodeOf(file, description).values.status == status;
+        });
     }
 
     // Returns the numbers of commands of the passes, each of which begins with the repository's

@@ -2,7 +2,10 @@
 
 #include "tests/tools/collect/CollectTest.h"
 
+#include "tests/support/ErrorOf.h"
+
 #include <array>
+#include <cerrno>
 #include <set>
 
 namespace CollectTests {
@@ -144,6 +147,21 @@ TEST_F(CollectTest, ASatelliteThatIsOffLosesItsSensorsOnly)
     EXPECT_EQ(nodeOf(file, "ME Temp").values.status, 13);
     EXPECT_EQ(nodeOf(file, "ME Temp").values.reading, std::nullopt);
     EXPECT_EQ(nodeOf(file, "CPU1 Temp").values.reading, 58);
+}
+
+TEST_F(CollectTest, ASatelliteToWhichTheKernelKnowsNoWayLosesItsSensorsOnly)
+{
+    for (const int error : {EINVAL, EAGAIN}) {
+        const MachineFile file =
+            collect({}, {{"SIMULATED_SATELLITE_ERROR", std::to_string(error)}});
+        EXPECT_EQ(nodeOf(file, "ME Temp").values.status, 13) << error;
+        EXPECT_EQ(nodeOf(file, "ME Temp").values.upperCritical, 100); // as the record says
+        EXPECT_EQ(nodeOf(file, "CPU1 Temp").values.reading, 58);
+    }
+    EXPECT_EQ(Testing::errorOf([this] {
+        collect({}, {{"SIMULATED_SATELLITE_ERROR", std::to_string(ENODEV)}});
+    }),
+        "sensorctl: /dev/ipmi0: No such device\n");
 }
 
 TEST_F(CollectTest, WorkaroundsAreApplied)

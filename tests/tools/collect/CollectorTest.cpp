@@ -73,6 +73,44 @@ TEST_F(CollectorTest, LeavesOutASensorWithoutFactors)
     EXPECT_EQ(pass(controller).description, "B");
 }
 
+// A fan whose reading is the reciprocal of a time, 12,500 per minute at the raw reading 80.
+SimulatedSensor reciprocalFan()
+{
+    return {.idString = Testing::eightBit("Fan"),
+        .type = 4,
+        .unit = 18,
+        .thresholds = {{Testing::lc, 250}, {Testing::lnr, 255}},
+        .linearization = 7,
+        .resultExponent = -6,
+        .number = 1};
+}
+
+TEST_F(CollectorTest, AFanThatStandsTurnsAtZeroWhereTheControllerSaysThatItIsSlow)
+{
+    FakeController controller({reciprocalFan()});
+    Bytes answer;
+    controller.override = [&](const Command& command, milliseconds) -> std::optional<Bytes> {
+        return command.code == CommandCode::getSensorReading ? std::optional(answer) : std::nullopt;
+    };
+    answer = {0, 80, 0x40, 0xC0};
+    EXPECT_EQ(pass(controller).values.reading, 12500);
+    const std::pair<int, unsigned> alarms[] = {{0x01, 22}, {0x02, 25}, {0x04, 25}, {0xC7, 25}};
+    for (const auto& [bits, status] : alarms) {
+        answer = {0, 0, 0x40, static_cast<std::uint8_t>(bits)};
+        EXPECT_EQ(pass(controller).values.status, status) << bits;
+        EXPECT_EQ(pass(controller).values.reading, 0) << bits;
+    }
+    // Without such an alarm, nothing is known.
+    for (const Bytes& unknown : {Bytes{0, 0, 0x40, 0xC0}, {0, 0, 0x40, 0x08}, {0, 0, 0x40}}) {
+        answer = unknown;
+        EXPECT_EQ(pass(controller).values.status, 13U);
+        EXPECT_EQ(pass(controller).values.reading, std::nullopt);
+    }
+    answer = {0, 0, 0, 0x02}; // is not scanned
+    EXPECT_EQ(pass(controller).values.status, 16U);
+    EXPECT_EQ(pass(controller).values.reading, std::nullopt);
+}
+
 TEST_F(CollectorTest, ASensorThatWasNeverThereIsNotPresent)
 {
     bool isThere = false;
