@@ -21,7 +21,7 @@ const std::string screenData = SENSOR_PROFILE_SOURCE_DIR "/tests/data/tools/";
 std::string command(const std::string& locale)
 {
     return "env -u NO_COLOR LC_ALL=" + locale + " RYNLOG_LOG=off RYNLOG_TRACE=off " + sensorctl +
-           " watch --interval 3600 --model " + screenData + "tables.json";
+           " watch --interval 3600 --model " + screenData + "tables/machine.json";
 }
 
 // Collects the screens that a terminal shows.

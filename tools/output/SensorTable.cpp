@@ -13,11 +13,12 @@ namespace Tools {
 
 namespace {
 
-// The least width of names for which columns of limits are left out.
+// The least widths of names for which the limits, and then the readings, are left out.
 constexpr std::size_t leastName = 16;
+constexpr std::size_t leastNameBesideReadings = 12;
 
-// Which columns a table has beside name, reading and state.
-enum class Layout { everything, limitColumns, limitPairs, noLimits };
+// Which columns a table has beside name, chip and state.
+enum class Layout { everything, limitColumns, limitPairs, noLimits, noReadings };
 
 using LimitSet = std::bitset<limitKinds.size()>;
 
@@ -79,7 +80,9 @@ private:
         std::vector<Column> columns = {{isGrouped_ ? "  NAME" : "NAME"}};
         if (!isGrouped_)
             columns.push_back({"CHIP"});
-        columns.insert(columns.end(), {{"READING", right}, {"", left, 1}, {"STATE"}});
+        if (layout != Layout::noReadings)
+            columns.insert(columns.end(), {{"READING", right}, {"", left, 1}});
+        columns.push_back({"STATE"});
         if (layout == Layout::limitPairs)
             columns.insert(
                 columns.end(), {{pairTitle(0, limits_)}, {pairTitle(firstUpperLimit, limits_)}});
@@ -96,8 +99,9 @@ private:
         std::vector<Cell> cells = {{(isGrouped_ ? "  " : "") + shown(sensor.label)}};
         if (!isGrouped_)
             cells.push_back({shown(sensor.chip)});
-        cells.insert(
-            cells.end(), {readingCell(sensor), unitCell(sensor, style_), stateCell(sensor)});
+        if (layout != Layout::noReadings)
+            cells.insert(cells.end(), {readingCell(sensor), unitCell(sensor, style_)});
+        cells.push_back(stateCell(sensor));
         if (layout == Layout::limitPairs)
             cells.insert(cells.end(), {{pairText(sensor, 0)}, {pairText(sensor, firstUpperLimit)}});
         for (std::size_t i = 0; i < limits_.size() && layout < Layout::limitPairs; ++i)
@@ -121,11 +125,15 @@ private:
 std::string sensorTable(const Sensors& sensors, Grouping grouping, const TextStyle& style)
 {
     const SensorTableBuilder builder(sensors, grouping, style);
-    for (const auto& [layout, name] : {std::pair(Layout::everything, unlimited),
-             {Layout::limitColumns, unlimited}, {Layout::limitPairs, leastName}})
+    for (const auto& [layout, name] :
+        {std::pair(Layout::everything, unlimited), {Layout::limitColumns, unlimited},
+            {Layout::limitPairs, leastName}, {Layout::noLimits, leastNameBesideReadings}})
         if (const Table table = builder.build(layout); table.width(name) <= style.width)
             return table.toText(style);
-    return builder.build(Layout::noLimits).toText(style);
+    std::string text;
+    for (const Line& line : builder.build(Layout::noReadings).lines(style))
+        text += textOf(cutLine(line, style), style);
+    return text;
 }
 
 } // namespace Tools

@@ -15,7 +15,8 @@ enum class Grouping { byChip, none };
 
 // Returns a table with label, reading, state and limits of each sensor: below a line for each chip,
 // or with the chip in each line. The fewer columns of a terminal there are, the fewer columns the
-// table has; only the widest has the identifiers.
+// table has; only the widest has the identifiers, and the narrowest has neither limits nor
+// readings. No line is longer than the width.
 std::string sensorTable(const Sensors& sensors, Grouping grouping, const TextStyle& style);
 
 } // namespace Tools
