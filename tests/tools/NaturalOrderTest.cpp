@@ -26,6 +26,9 @@ TEST(NaturalOrderTest, LettersAreComparedWithoutRegardToCase)
     EXPECT_TRUE(isBefore("Alpha", "beta"));
     EXPECT_FALSE(isBefore("TEMP1", "temp1"));
     EXPECT_FALSE(isBefore("temp1", "TEMP1"));
+    EXPECT_FALSE(isBefore("Lüfter", "LÜFTER"));
+    EXPECT_FALSE(isBefore("LÜFTER", "Lüfter"));
+    EXPECT_TRUE(isBefore("lÜfter 2", "LüFTER 10"));
 }
 
 TEST(NaturalOrderTest, LeadingZerosDoNotCount)

@@ -40,6 +40,25 @@ TEST_F(SelectionTest, SelectorsAreNamesAndPatternsInAnyCase)
     EXPECT_THAT(idsOf({"fan2"}), ElementsAre("Fan:/board/fan2"));
 }
 
+TEST_F(SelectionTest, LettersOfAllScriptsAreSelectedInAnyCase)
+{
+    const std::string file = model(R"(
+        { "type": "tachometer", "path": "/Gehäuse/fan1", "description": "LÜFTER", "status": 1 },
+        { "type": "tachometer", "path": "/gehäuse/fan2", "description": "вентилятор", "status": 1 },
+        { "type": "tachometer", "path": "/x/fan3", "description": "Straße", "status": 1 })");
+    const auto found = [&](const std::string& selector) {
+        return nlohmann::json::parse(run({"list", "--json", "--model", file, selector}).out).size();
+    };
+    for (const char* const selector : {"lüfter", "LÜFTER", "*üf*", "ВЕНТИЛЯТОР", "Вент*", "STRAßE"})
+        EXPECT_EQ(found(selector), 1U) << selector;
+    EXPECT_EQ(found("GEHÄUSE"), 2U);
+    EXPECT_EQ(found("luefter"), 0U);
+    EXPECT_EQ(found("\xFC"), 0U);
+    EXPECT_THAT(
+        run({"list", "Lüftr", "--model", file}, {.environment = {{"LC_ALL", "C.UTF-8"}}}).err,
+        HasSubstr("what comes nearest: \"LÜFTER\""));
+}
+
 TEST_F(SelectionTest, AddressesOfChipsMayBeShortened)
 {
     const std::string file = model(R"(

@@ -2,7 +2,8 @@
 
 #include "tools/sensors/NaturalOrder.h"
 
-#include "host/broker/Names.h"
+#include "platform/text/Utf8.h"
+#include "tools/sensors/LetterCase.h"
 
 #include <algorithm>
 
@@ -25,6 +26,14 @@ std::string_view takeNumber(std::string_view& text)
     return digits;
 }
 
+// Removes the first character and returns it as a small letter.
+char32_t takeLetter(std::string_view& text)
+{
+    const Text::Character character = Text::firstCharacter(text);
+    text.remove_prefix(character.size);
+    return smallLetter(character.code);
+}
+
 } // namespace
 
 std::weak_ordering compareNaturally(std::string_view first, std::string_view second)
@@ -39,12 +48,10 @@ std::weak_ordering compareNaturally(std::string_view first, std::string_view sec
                 return order;
             continue;
         }
-        const auto left = static_cast<unsigned char>(Host::foldCase(first.front()));
-        const auto right = static_cast<unsigned char>(Host::foldCase(second.front()));
+        const char32_t left = takeLetter(first);
+        const char32_t right = takeLetter(second);
         if (const auto order = left <=> right; order != 0)
             return order;
-        first.remove_prefix(1);
-        second.remove_prefix(1);
     }
     return first.size() <=> second.size();
 }

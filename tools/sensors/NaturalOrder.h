@@ -9,8 +9,7 @@
 
 namespace Tools {
 
-// Compares texts so that "temp2" comes before "temp10", without regard to the case of ASCII
-// letters.
+// Compares texts so that "temp2" comes before "temp10", without regard to letter case.
 std::weak_ordering compareNaturally(std::string_view first, std::string_view second);
 
 } // namespace Tools

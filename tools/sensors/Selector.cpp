@@ -2,7 +2,7 @@
 
 #include "tools/sensors/Selector.h"
 
-#include "host/broker/Names.h"
+#include "tools/sensors/LetterCase.h"
 
 #include <fnmatch.h>
 
@@ -25,13 +25,10 @@ bool isPattern(std::string_view text)
 }
 
 // Returns the least number of insertions, deletions and replacements of a character, and of swaps
-// of two, that turn the text into some part of the name, without regard to letter case (Sellers'
-// algorithm).
+// of two, that turn the text into some part of the name (Sellers' algorithm).
 std::size_t distanceFrom(std::string_view text, std::string_view name)
 {
-    const auto isSame = [&](std::size_t i, std::size_t j) {
-        return Host::foldCase(text[i]) == Host::foldCase(name[j]);
-    };
+    const auto isSame = [&](std::size_t i, std::size_t j) { return text[i] == name[j]; };
     std::vector<std::size_t> last(name.size() + 1, 0);
     std::vector<std::size_t> lastButOne;
     for (std::size_t i = 0; i < text.size(); ++i) {
@@ -65,23 +62,25 @@ std::string withPlainAddress(const std::string& chip)
     return chip.substr(0, dash + 1).append(digits.substr(zeros));
 }
 
+// REQUIRES: the selector has no capital letters.
 bool isMatch(const std::string& selector, const std::string& name)
 {
-    return Host::equalNames(name, selector) ||
-           (isPattern(selector) &&
-               ::fnmatch(selector.c_str(), name.c_str(), FNM_CASEFOLD | FNM_NOESCAPE) == 0);
+    const std::string small = withSmallLetters(name);
+    return small == selector ||
+           (isPattern(selector) && ::fnmatch(selector.c_str(), small.c_str(), FNM_NOESCAPE) == 0);
 }
 
 } // namespace
 
 bool selects(const std::string& selector, const Sensor& sensor)
 {
+    const std::string small = withSmallLetters(selector);
     const std::array<std::string, 7> names = {sensor.chip, sensor.label, sensor.feature,
         sensor.path, sensor.deviceId, sensor.chip + "/" + sensor.label,
         sensor.chip + "/" + sensor.feature};
-    return isMatch(withPlainAddress(selector), withPlainAddress(sensor.chip)) ||
+    return isMatch(withPlainAddress(small), withPlainAddress(sensor.chip)) ||
            std::any_of(names.begin(), names.end(),
-               [&](const std::string& name) { return isMatch(selector, name); });
+               [&](const std::string& name) { return isMatch(small, name); });
 }
 
 bool isOfKind(const std::vector<std::string>& kinds, const Sensor& sensor)
@@ -89,12 +88,18 @@ bool isOfKind(const std::vector<std::string>& kinds, const Sensor& sensor)
     return kinds.empty() || std::find(kinds.begin(), kinds.end(), sensor.kind) != kinds.end();
 }
 
+bool SensorFilter::accepts(const Sensor& sensor) const
+{
+    return isOfKind(kinds, sensor) && (!onlyProblems || isProblem(sensor.state.urgency));
+}
+
 std::string nothingMatches(const std::string& selector, const Sensors& sensors)
 {
     std::set<std::tuple<std::size_t, std::size_t, std::string>> nearest; // by distance and length
     for (const Sensor& sensor : sensors)
         for (const std::string& name : {sensor.chip, sensor.label, sensor.path}) {
-            const std::size_t distance = distanceFrom(selector, name);
+            const std::size_t distance =
+                distanceFrom(withSmallLetters(selector), withSmallLetters(name));
             if (!selector.empty() && distance <= selector.size() / 3)
                 nearest.emplace(distance, name.size(), name);
             if (nearest.size() > suggestions)

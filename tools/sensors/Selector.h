@@ -19,6 +19,15 @@ bool selects(const std::string& selector, const Sensor& sensor);
 // Returns whether the sensor is of one of the kinds, or there are none.
 bool isOfKind(const std::vector<std::string>& kinds, const Sensor& sensor);
 
+// What else a sensor must be, beside what its name is.
+struct SensorFilter {
+    std::vector<std::string> kinds; // all where there are none
+    bool onlyProblems = false;
+
+    bool isEmpty() const { return kinds.empty() && !onlyProblems; }
+    bool accepts(const Sensor& sensor) const;
+};
+
 // Returns a sentence that no sensor matches the selector, with up to three names that are nearest.
 std::string nothingMatches(const std::string& selector, const Sensors& sensors);
 

@@ -1,0 +1,48 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "tools/sensors/LetterCase.h"
+
+#include "host/broker/Names.h"
+#include "platform/text/Utf8.h"
+
+#include <clocale>
+#include <cwctype>
+#include <memory>
+#include <type_traits>
+
+namespace Tools {
+
+namespace {
+
+constexpr char32_t endOfAscii = 0x80;
+
+char32_t smallForeignLetter(char32_t character)
+{
+    using Locale = std::unique_ptr<std::remove_pointer_t<locale_t>, decltype(&::freelocale)>;
+    static const Locale locale(::newlocale(LC_CTYPE_MASK, "C.UTF-8", nullptr), &::freelocale);
+    return locale == nullptr ? character
+                             : static_cast<char32_t>(::towlower_l(character, locale.get()));
+}
+
+} // namespace
+
+char32_t smallLetter(char32_t character)
+{
+    return character < endOfAscii
+               ? static_cast<char32_t>(Host::foldCase(static_cast<char>(character)))
+               : smallForeignLetter(character);
+}
+
+std::string withSmallLetters(std::string_view text)
+{
+    std::string small;
+    small.reserve(text.size());
+    while (!text.empty()) {
+        const Text::Character character = Text::firstCharacter(text);
+        Text::appendUtf8(small, smallLetter(character.code));
+        text.remove_prefix(character.size);
+    }
+    return small;
+}
+
+} // namespace Tools
