@@ -15,6 +15,7 @@
 #include <unistd.h>
 
 #include <algorithm>
+#include <cerrno> // program_invocation_name
 #include <cstddef>
 #include <exception>
 #include <memory>
@@ -66,7 +67,7 @@ Command* chosenOf(const Commands& commands)
 ExitCode refuse(
     const CLI::App& tool, const Command* command, Output& out, const std::string& reason)
 {
-    std::string words = "sensorctl";
+    std::string words = program_invocation_name;
     for (const CLI::App* const chosen : tool.get_subcommands())
         words += " " + chosen->get_name();
     const std::string text = reason + " (" + words + " --help says what is possible)";

@@ -6,7 +6,12 @@
 #include "tools/SourceOptions.h"
 #include "tools/output/Output.h"
 
+#include <CLI/CLI.hpp>
+
+#include <algorithm>
+#include <cerrno> // program_invocation_name
 #include <stdexcept>
+#include <string_view>
 
 namespace Tools {
 
@@ -17,15 +22,34 @@ namespace {
 // Returns the text as a word of the shell.
 std::string quoted(const std::string& text)
 {
+    constexpr std::string_view marks = "%+,-./:=@_";
+    const bool isPlain = std::all_of(text.begin(), text.end(), [&](char c) {
+        return (c >= '0' && c <= '9') || (c >= 'A' && c <= 'Z') || (c >= 'a' && c <= 'z') ||
+               marks.find(c) != std::string_view::npos;
+    });
+    if (isPlain && !text.empty())
+        return text;
     std::string word = "'";
     for (const char c : text)
         word += c == '\'' ? "'\\''" : std::string(1, c);
     return word + "'";
 }
 
-std::string option(const std::string& name, const std::optional<std::string>& value)
+// Returns the options that the parser was given, each after a blank.
+std::string givenOptions(const CLI::App& parser)
 {
-    return value ? " " + name + " " + quoted(*value) : "";
+    std::string words;
+    for (const CLI::Option* const option : parser.get_options()) {
+        if (option->get_positional())
+            continue;
+        const bool isFlag = option->get_expected_max() == 0;
+        for (const std::string& value : option->results()) {
+            words.append(" ").append(option->get_name());
+            if (!isFlag)
+                words.append(" ").append(quoted(value));
+        }
+    }
+    return words;
 }
 
 } // namespace
@@ -58,14 +82,14 @@ ExitCode complainOfEmptyMachine(const std::optional<std::string>& model)
 }
 
 ExitCode complainOfNoObject(
-    const ObjectFound& found, const std::string& command, const SourceOptions& source)
+    const ObjectFound& found, const CLI::App& parser, const std::optional<std::string>& model)
 {
     if (found.isMachineEmpty) {
         checkMachineIsEmpty();
-        return complainOfEmptyMachine(source.model());
+        return complainOfEmptyMachine(model);
     }
-    const std::string start = "sensorctl " + command + option("--model", source.model()) +
-                              option("--provider", source.provider());
+    const std::string start =
+        quoted(program_invocation_name) + " " + parser.get_name() + givenOptions(parser);
     std::vector<std::string> lines;
     for (const Sensor& sensor : found.choices)
         lines.push_back(

@@ -11,9 +11,11 @@
 #include <optional>
 #include <string>
 
-namespace Tools {
+namespace CLI {
+class App;
+}
 
-class SourceOptions;
+namespace Tools {
 
 // Returns the number of the machine's sensors, counted without a provider. Throws
 // std::runtime_error with the reason when the machine cannot be read.
@@ -29,9 +31,9 @@ void checkMachineIsEmpty();
 ExitCode complainOfEmptyMachine(const std::optional<std::string>& model);
 
 // Writes to standard error why there is no object, with the command lines for sensors to choose
-// from, which repeat --model and --provider. Calls checkMachineIsEmpty() where the machine has no
-// sensors.
+// from. They begin with the words by which the tool was called, and repeat the options that the
+// command's parser was given. Calls checkMachineIsEmpty() where the machine has no sensors.
 ExitCode complainOfNoObject(
-    const ObjectFound& found, const std::string& command, const SourceOptions& source);
+    const ObjectFound& found, const CLI::App& parser, const std::optional<std::string>& model);
 
 } // namespace Tools

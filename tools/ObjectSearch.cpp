@@ -4,7 +4,6 @@
 
 #include "host/broker/Instance.h"
 #include "tools/cim/ProviderClient.h"
-#include "tools/sensors/Selector.h"
 
 #include <algorithm>
 
@@ -22,14 +21,16 @@ const Host::Instance* capabilities(ProviderClient& provider, std::string_view in
     return found == all.end() ? nullptr : *found;
 }
 
-bool isSensorOfKind(const std::vector<std::string>& kinds, const Host::Instance& object)
+bool isAccepted(const SensorFilter& filter, const Host::Instance& object)
 {
-    return object.className() == sensorClass && isOfKind(kinds, Sensor(object));
+    return filter.isEmpty() ||
+           (object.className() == sensorClass && filter.accepts(Sensor(object)));
 }
 
-std::string noneOfKind(const std::string& wanted)
+std::string noneAccepted(const SensorFilter& filter, const std::string& wanted)
 {
-    return "no sensor of that kind matches \"" + wanted + "\"";
+    return std::string("no sensor") + (filter.kinds.empty() ? "" : " of that kind") +
+           (filter.onlyProblems ? " with a problem" : "") + " matches \"" + wanted + "\"";
 }
 
 } // namespace
@@ -39,12 +40,12 @@ ObjectFound ObjectSearch::find(const std::string& wanted)
     if (const Host::ObjectPath* const path = provider_.readPath(wanted))
         return findByPath(*path, wanted);
     ObjectFound found;
-    bool isOfOtherKind = false;
+    bool isRefused = false;
     for (const Sensor& sensor : sensors()) {
         if (!selects(wanted, sensor))
             continue;
-        if (!isOfKind(kinds_, sensor)) {
-            isOfOtherKind = true;
+        if (!filter_.accepts(sensor)) {
+            isRefused = true;
             continue;
         }
         if (sensor.deviceId == wanted) {
@@ -58,11 +59,12 @@ ObjectFound ObjectSearch::find(const std::string& wanted)
                           std::to_string(found.choices.size()) + " sensors:";
     else if (found.choices.size() == 1)
         found.object = found.choices.front().instance;
-    else if (kinds_.empty())
+    else if (filter_.isEmpty())
         found.object = capabilities(provider_, wanted);
     found.isMachineEmpty = sensors().empty();
     if (found.complaint.empty())
-        found.complaint = isOfOtherKind ? noneOfKind(wanted) : nothingMatches(wanted, sensors());
+        found.complaint =
+            isRefused ? noneAccepted(filter_, wanted) : nothingMatches(wanted, sensors());
     return found;
 }
 
@@ -71,9 +73,9 @@ ObjectFound ObjectSearch::findByPath(const Host::ObjectPath& path, const std::st
     ObjectFound found;
     found.object = provider_.instance(path);
     found.complaint = "there is no object with the path \"" + wanted + "\"";
-    if (found.object != nullptr && !kinds_.empty() && !isSensorOfKind(kinds_, *found.object)) {
+    if (found.object != nullptr && !isAccepted(filter_, *found.object)) {
         found.object = nullptr;
-        found.complaint = noneOfKind(wanted);
+        found.complaint = noneAccepted(filter_, wanted);
     }
     return found;
 }

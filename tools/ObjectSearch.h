@@ -4,7 +4,7 @@
 
 #pragma once
 
-#include "tools/sensors/SensorList.h"
+#include "tools/sensors/Selector.h"
 
 #include <optional>
 #include <string>
@@ -28,10 +28,10 @@ struct ObjectFound {
 // Reads the sensors once, when it needs them first.
 class ObjectSearch {
 public:
-    // Finds sensors of these kinds only; all objects where there are none. Provider and kinds must
+    // Finds only sensors that the filter accepts, unless it is empty. Provider and filter must
     // outlive the object.
-    ObjectSearch(ProviderClient& provider, const std::vector<std::string>& kinds)
-        : provider_(provider), kinds_(kinds)
+    ObjectSearch(ProviderClient& provider, const SensorFilter& filter)
+        : provider_(provider), filter_(filter)
     {
     }
 
@@ -45,7 +45,7 @@ private:
     const Sensors& sensors();
 
     ProviderClient& provider_;
-    const std::vector<std::string>& kinds_;
+    const SensorFilter& filter_;
     std::optional<Sensors> sensors_;
 };
 

@@ -186,6 +186,25 @@ TEST_F(CheckTest, ASensorInAnUnknownStateIsUnknownUnlessSomethingIsWorse)
     EXPECT_EQ(checkedFile(file, {"a", "--warning", "a=60", "--critical", "a=40"}).code, 2);
 }
 
+TEST_F(CheckTest, ProblemsLeaveOutWhatIsOk)
+{
+    EXPECT_EQ(checked({"--problems"}).out,
+        "SENSORS CRITICAL - cpu1/CPU 2: Critical high (97 C), board/+12V: Warning high (12.75 V), "
+        "board/Fan (fan2): Lost - 3 sensors: 1 warning, 1 critical, 1 lost. | "
+        "'board/+12V'=12.75V;~:12.5;10.5: 'cpu1/CPU 2'=97C;;~:95\n");
+    EXPECT_EQ(checked({"cpu0", "--problems"}).out, "SENSORS OK - no problem in 1 sensor.\n");
+    EXPECT_EQ(checked({"cpu0", "/board/fan1", "--problems"}).out,
+        "SENSORS OK - no problem in 2 sensors.\n");
+    EXPECT_EQ(checked({"cpu0", "--problems"}).code, 0);
+    EXPECT_EQ(checked({"cpu0", "--problems", "--warning", "cpu0=40"}).out,
+        "SENSORS WARNING - cpu0/CPU 1: 41 C is beyond 40 - 1 sensor: 1 normal. | "
+        "'cpu0/CPU 1'=41C;40;~:95\n");
+    EXPECT_EQ(
+        checked({"cpu1", "--problems", "--warning", "cpu1=99", "--critical", "cpu1=100"}).code, 0);
+    EXPECT_EQ(checked({"nothing", "--problems"}).out,
+        "SENSORS UNKNOWN - no sensor matches \"nothing\"\n");
+}
+
 TEST_F(CheckTest, ManyProblemsAreCounted)
 {
     const auto checkedWith = [&](int sensors) {

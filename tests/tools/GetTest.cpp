@@ -100,24 +100,64 @@ TEST_F(GetTest, KindNarrowsWhatANameMatches)
     EXPECT_THAT(got("board", {"--kind", "fan"}).err, HasSubstr("choose one of its 2 sensors"));
 }
 
+TEST_F(GetTest, ProblemsNarrowWhatANameMatches)
+{
+    EXPECT_EQ(got("Fan", {"--problems"}).out, got("Fan:/board/fan2").out);
+    EXPECT_EQ(got("+12V:/board/in1", {"--problems"}).out, got("+12V").out);
+    EXPECT_THAT(got("cpu*", {"--problems"}).out, HasSubstr("  DeviceID       CPU 2:/cpu1/temp1\n"));
+    const std::string path = json::parse(got("CPU 1", {"--cim"}).out)["instances"][0]["path"];
+    for (const std::string& wanted : {std::string("cpu 1"), path}) {
+        const Ended ended = got(wanted, {"--problems"});
+        EXPECT_EQ(ended.code, 3);
+        EXPECT_EQ(ended.err, "sensorctl: no sensor with a problem matches \"" + wanted + "\"\n");
+    }
+    EXPECT_EQ(got("cpu0", {"--problems", "--kind", "temperature"}).err,
+        "sensorctl: no sensor of that kind with a problem matches \"cpu0\"\n");
+    EXPECT_EQ(got("ZUMLO:SensorEnabledLogicalElementCap1", {"--problems"}).code, 3);
+}
+
 TEST_F(GetTest, OffersTheChoicesOfAnAmbiguousNameAsLinesToCopy)
 {
     const Ended ended = got("Fan");
     EXPECT_EQ(ended.code, 1);
     EXPECT_EQ(ended.out, "");
-    const std::string start = "\n  sensorctl get --model '" + smallModel() + "' 'Fan:/board/fan";
+    const std::string start =
+        "\n  " + sensorctl + " get --model " + smallModel() + " Fan:/board/fan";
     EXPECT_EQ(ended.err, "sensorctl: \"Fan\" is ambiguous; choose one of its 2 sensors:" + start +
-                             "1'" + start + "2'\n");
-    const std::string line = linesOf(ended.err).back();
-    const std::string command = sensorctl + line.substr(line.find(" get"));
-    EXPECT_THAT(run({"-c", command}, {.program = "/bin/sh"}).out, HasSubstr("/board/fan2\n"));
+                             "1" + start + "2\n");
+    EXPECT_THAT(run({"-c", linesOf(ended.err).back()}, {.program = "/bin/sh"}).out,
+        HasSubstr("/board/fan2\n"));
 }
 
-TEST_F(GetTest, ChoicesNameTheProviderThatWasGiven)
+TEST_F(GetTest, ChoicesRepeatTheOptions)
 {
-    const Ended ended = got("Fan", {"--provider", sensorLibrary});
-    EXPECT_THAT(linesOf(ended.err).back(),
-        testing::EndsWith(" --provider '" + sensorLibrary + "' 'Fan:/board/fan2'"));
+    const std::string file = model(R"(
+        { "type": "tachometer", "path": "/a/1", "description": "Fan", "status": 13 },
+        { "type": "tachometer", "path": "/a/2", "description": "Fan", "status": 13 },
+        { "type": "tachometer", "path": "/a/3", "description": "Fan", "status": 1 })");
+    const std::vector<std::vector<std::string>> forms = {{"--json"}, {"--cim"},
+        {"-v", "--kind", "fan", "--kind", "voltage", "--problems", "--color", "always"}};
+    for (std::vector<std::string> options : forms) {
+        options.insert(options.end(), {"--provider", sensorLibrary, "--model", file});
+        std::vector<std::string> words = {"get", "Fan"};
+        words.insert(words.end(), options.begin(), options.end());
+        const std::string line = linesOf(run(words).err).at(1);
+        words[1] = "Fan:/a/1";
+        const std::string expected = run(words).out;
+        EXPECT_THAT(expected, HasSubstr("Fan:/a/1"));
+        EXPECT_EQ(run({"-c", line}, {.program = "/bin/sh"}).out, expected) << line;
+    }
+}
+
+TEST_F(GetTest, ChoicesBeginWithTheWordsOfTheCall)
+{
+    const auto called = [&](const std::string& name) {
+        const std::string command =
+            "exec -a " + name + " " + sensorctl + " get Fan --model " + smallModel();
+        return run({"-c", command}, {.program = "/bin/bash"}).err;
+    };
+    EXPECT_THAT(called("./run"), HasSubstr("\n  ./run get --model "));
+    EXPECT_THAT(called("'/my tools/sensorctl'"), HasSubstr("\n  '/my tools/sensorctl' get "));
 }
 
 TEST_F(GetTest, ChoicesAreQuotedForTheShell)

@@ -182,8 +182,9 @@ TEST_F(ServeTest, OptionsThatMakeNoSenseAreWrongUsage)
             {"--max-body", "lots"}, {"--grace-period", "0"}, {"--unknown"}, {"positional"}}) {
         const Ended ended = failing(withModel(arguments));
         EXPECT_EQ(ended.code, 2) << arguments[0] << ended.err;
-        EXPECT_THAT(ended.err, AllOf(StartsWith("sensorctl: "),
-                                   EndsWith(" (sensorctl serve --help says what is possible)\n")));
+        EXPECT_THAT(
+            ended.err, AllOf(StartsWith("sensorctl: "),
+                           EndsWith(" (" + sensorctl + " serve --help says what is possible)\n")));
     }
 }
 

@@ -91,6 +91,13 @@ int rankOf(CheckStatus status)
 
 } // namespace
 
+CheckStatus statusOf(const Sensor& sensor, const Overrides& overrides)
+{
+    return verdictOn(
+        sensor, findRange(overrides.warning, sensor), findRange(overrides.critical, sensor))
+        .status;
+}
+
 void Report::add(CheckStatus status, std::string problem)
 {
     problems_.push_back({status, std::move(problem)});

@@ -28,6 +28,9 @@ struct Overrides {
     std::vector<Override> critical;
 };
 
+// Returns the status of a sensor by its state and the ranges.
+CheckStatus statusOf(const Sensor& sensor, const Overrides& overrides);
+
 class Report {
 public:
     // Adds a problem: a sentence without a full stop.

@@ -43,12 +43,24 @@ std::vector<Override> overridesIn(const std::vector<std::string>& texts)
     return overrides;
 }
 
+// Returns a sentence about the sensors that are left of those that were judged; an empty text where
+// there were none.
+std::string summaryOf(const Sensors& sensors, std::size_t judged)
+{
+    if (!sensors.empty())
+        return Tools::summaryOf(sensors);
+    return judged == 0 ? ""
+                       : "no problem in " + std::to_string(judged) +
+                             (judged == 1 ? " sensor." : " sensors.");
+}
+
 class CheckCommand : public Command {
 public:
     explicit CheckCommand(CLI::App& tool)
         : Command(tool, "check", "Judge the sensors for a monitoring system")
     {
         selection_.addTo(parser());
+        parser().add_flag("--problems", onlyProblems_, "Leave out the sensors that are OK");
         parser()
             .add_option("--warning", warning_, "WARNING where a reading is beyond the range")
             ->type_name("SELECTOR=RANGE")
@@ -75,7 +87,12 @@ public:
             checkMachineIsEmpty();
 
         Report report;
-        const auto selected = selection_.select(all);
+        auto selected = selection_.select(all);
+        const std::size_t judged = selected.sensors.size();
+        if (onlyProblems_)
+            std::erase_if(selected.sensors, [&](const Sensor& sensor) {
+                return statusOf(sensor, overrides) == CheckStatus::ok;
+            });
         addMissing(report, expected, all);
         addSensors(report, selected.sensors, all, overrides);
         for (const auto* const list : {&overrides.warning, &overrides.critical})
@@ -90,8 +107,7 @@ public:
         else
             for (const std::string& complaint : selected.complaints)
                 report.add(CheckStatus::unknown, complaint);
-        out.write(report.toText(
-            selected.sensors.empty() ? "" : summaryOf(selected.sensors), isUtf8Locale()));
+        out.write(report.toText(summaryOf(selected.sensors, judged), isUtf8Locale()));
         return static_cast<ExitCode>(report.status());
     }
 
@@ -128,6 +144,7 @@ private:
     }
 
     SelectionOptions selection_;
+    bool onlyProblems_ = false;
     std::vector<std::string> warning_;
     std::vector<std::string> critical_;
     std::optional<std::string> expected_;

@@ -37,6 +37,7 @@ public:
         parser().add_flag(
             "-v,--verbose", isVerbose_, "Show all properties with the meanings of their codes");
         selection_.addKind(parser());
+        selection_.addProblems(parser());
         display_.addJson(parser());
         display_.addColor(parser());
         source_.addModel(parser());
@@ -49,7 +50,7 @@ public:
         const ObjectFound missing = show(out);
         if (missing.complaint.empty())
             return ExitCode::success;
-        return complainOfNoObject(missing, "get", source_);
+        return complainOfNoObject(missing, parser(), source_.model());
     }
 
 private:
@@ -57,7 +58,7 @@ private:
     ObjectFound show(Output& out) const
     {
         ProviderClient provider(source_.providerFiles());
-        ObjectSearch search(provider, selection_.kinds());
+        ObjectSearch search(provider, selection_.filter());
         Instances objects;
         Sensors sensors;
         for (const std::string& wanted : wanted_) {

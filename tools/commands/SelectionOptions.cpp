@@ -2,8 +2,6 @@
 
 #include "tools/commands/SelectionOptions.h"
 
-#include "tools/sensors/Selector.h"
-
 #include <CLI/CLI.hpp>
 
 #include <algorithm>
@@ -24,7 +22,7 @@ void SelectionOptions::addTo(CLI::App& parser)
 void SelectionOptions::addKind(CLI::App& parser)
 {
     const std::set<std::string> choices(sensorKinds.begin(), sensorKinds.end());
-    parser.add_option("--kind", kinds_, "Only this kind: temperature, voltage or fan")
+    parser.add_option("--kind", filter_.kinds, "Only this kind: temperature, voltage or fan")
         ->type_name("KIND")
         ->allow_extra_args(false)
         ->transform(CLI::IsMember(choices, CLI::ignore_case).description(""));
@@ -32,7 +30,8 @@ void SelectionOptions::addKind(CLI::App& parser)
 
 void SelectionOptions::addProblems(CLI::App& parser)
 {
-    parser.add_flag("--problems", onlyProblems_, "Only sensors that warn, are critical or lost");
+    parser.add_flag(
+        "--problems", filter_.onlyProblems, "Only sensors that warn, are critical or lost");
 }
 
 SelectionOptions SelectionOptions::withoutSelectors() const
@@ -45,7 +44,7 @@ SelectionOptions SelectionOptions::withoutSelectors() const
 bool SelectionOptions::isSelected(const Sensor& sensor) const
 {
     const auto isMatch = [&](const std::string& each) { return selects(each, sensor); };
-    return isOfKind(kinds_, sensor) &&
+    return isOfKind(filter_.kinds, sensor) &&
            (selectors_.empty() || std::any_of(selectors_.begin(), selectors_.end(), isMatch));
 }
 
@@ -59,9 +58,7 @@ SelectionOptions::Selected SelectionOptions::select(Sensors all) const
     std::erase_if(all, [&](const Sensor& sensor) { return !isSelected(sensor); });
     selected.sensors = std::move(all);
     const bool isOfSomeKind = !selected.sensors.empty();
-    if (onlyProblems_)
-        std::erase_if(selected.sensors,
-            [](const Sensor& sensor) { return !isProblem(sensor.state.urgency); });
+    std::erase_if(selected.sensors, [&](const Sensor& sensor) { return !filter_.accepts(sensor); });
     if (selected.sensors.empty() && selected.complaints.empty())
         selected.complaints.emplace_back(
             isOfSomeKind ? "none of the sensors has a problem" : "no sensor is of that kind");

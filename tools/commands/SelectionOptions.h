@@ -4,7 +4,7 @@
 
 #pragma once
 
-#include "tools/sensors/SensorList.h"
+#include "tools/sensors/Selector.h"
 
 #include <string>
 #include <vector>
@@ -26,8 +26,8 @@ public:
     void addProblems(CLI::App& parser);
 
     const std::vector<std::string>& selectors() const { return selectors_; }
-    const std::vector<std::string>& kinds() const { return kinds_; }
-    bool isGiven() const { return !selectors_.empty() || !kinds_.empty() || onlyProblems_; }
+    const SensorFilter& filter() const { return filter_; }
+    bool isGiven() const { return !selectors_.empty() || !filter_.isEmpty(); }
     // Returns what the other options select.
     SelectionOptions withoutSelectors() const;
 
@@ -42,8 +42,7 @@ public:
 
 private:
     std::vector<std::string> selectors_;
-    std::vector<std::string> kinds_;
-    bool onlyProblems_ = false;
+    SensorFilter filter_;
 };
 
 } // namespace Tools

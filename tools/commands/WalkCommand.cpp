@@ -75,7 +75,7 @@ private:
     {
         if (!wanted_)
             return provider.instances(computerSystemClass);
-        root = ObjectSearch(provider, selection_.kinds()).find(*wanted_);
+        root = ObjectSearch(provider, selection_.filter()).find(*wanted_);
         return root.object == nullptr ? Instances{} : Instances{root.object};
     }
 
@@ -98,7 +98,7 @@ private:
     ExitCode complainOfNothing(const ObjectFound& root) const
     {
         if (wanted_)
-            return complainOfNoObject(root, "walk", source_);
+            return complainOfNoObject(root, parser(), source_.model());
         complain("there is no computer system");
         return ExitCode::nothingFound;
     }
