@@ -155,6 +155,34 @@ TEST_F(ChipDevicesTest, AreNamedWhereTheKernelKnowsThem)
         run({"get", "drivetemp*"}).out, testing::HasSubstr("\n  Device         WDC WD80EFAX\n"));
 }
 
+TEST_F(ChipDevicesTest, SlotsBatteriesAndWirelessInterfacesAreNamed)
+{
+    const TemporaryFolder buses;
+    std::filesystem::create_directories(buses.path() / "pci/slots/4");
+    std::filesystem::create_directories(buses.path() / "pci/slots/7-1");
+    buses.write("pci/slots/4/address", "0000:3b:00\n");
+    buses.write("pci/slots/7-1/address", "0000:5e:00\n");
+    const BindMount mount(buses.path(), "/sys/bus");
+    add("hwmon0", "amdgpu", "pci", "0000:5e:00.0");
+    add("hwmon1", "radeon", "pci", "0000:61:00.0");
+    add("hwmon2", "BAT0", "acpi", "PNP0C0A:00");
+    sysfs_->write("hwmon/hwmon2/device/model_name", "DELL 7FHHV\n");
+    // The device of the chip is that of the radio, below the addressed one.
+    add("hwmon3", "mt7921_phy0", "pci", "0000:02:00.0");
+    const auto card = sysfs_->path("devices/0000:02:00.0");
+    std::filesystem::create_directories(card / "ieee80211/phy0");
+    std::filesystem::create_directories(card / "net/wlan0");
+    std::filesystem::create_symlink(
+        "../../../../class/ieee80211", card / "ieee80211/phy0/subsystem");
+    std::filesystem::create_symlink("../..", card / "ieee80211/phy0/device");
+    sysfs_->remove("hwmon/hwmon3/device");
+    std::filesystem::create_symlink(
+        "../../devices/0000:02:00.0/ieee80211/phy0", sysfs_->path("hwmon/hwmon3/device"));
+    EXPECT_EQ(devices(), (std::map<std::string, std::string>{{"amdgpu-pci-5e00", "PCI slot 7-1"},
+                             {"radeon-pci-6100", ""}, {"BAT0-acpi-0", "DELL 7FHHV"},
+                             {"mt7921_phy0-pci-0200", "wlan0"}}));
+}
+
 TEST_F(ChipDevicesTest, ChannelsOfOtherKindsAreCounted)
 {
     add("hwmon0", "testchip", "platform", "testchip.656");

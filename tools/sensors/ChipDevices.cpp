@@ -75,14 +75,16 @@ std::string slotOf(const std::string& address)
     return "";
 }
 
-std::string deviceIn(const std::string& folder, const std::string& address)
+// Returns what the device of a chip is, or that with the address which it belongs to.
+std::string deviceIn(const std::string& folder, const Files::path& addressed)
 {
     for (const char* const attribute : {"/model", "/model_name"})
         if (std::string model = lineIn(folder + attribute); !model.empty())
             return model;
-    if (const auto interfaces = entriesOf(folder + "/net"); !interfaces.empty())
-        return interfaces.front();
-    return slotOf(address);
+    for (const std::string& place : {folder, addressed.string()})
+        if (const auto interfaces = entriesOf(place + "/net"); !interfaces.empty())
+            return interfaces.front();
+    return slotOf(addressed.filename().string());
 }
 
 // Adds the device of the chip in the folder to those by the name of the chip.
@@ -95,14 +97,12 @@ void addDevice(
     if (failure)
         return;
     // A class device, such as that of a controller, may stand between the chip and its address.
-    for (Files::path place = real; place.has_relative_path(); place = place.parent_path()) {
-        const std::string address = place.filename().string();
-        if (const auto suffix = addressIn(address)) {
-            devices.emplace(name + *suffix, deviceIn(device, address));
+    for (Files::path place = real; place.has_relative_path(); place = place.parent_path())
+        if (const auto suffix = addressIn(place.filename().string())) {
+            devices.emplace(name + *suffix, deviceIn(device, place));
             return;
         }
-    }
-    devices.emplace(name + "-acpi-0", deviceIn(device, ""));
+    devices.emplace(name + "-acpi-0", deviceIn(device, real));
 }
 
 } // namespace
