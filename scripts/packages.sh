@@ -54,22 +54,34 @@ size_of_packages() {
       /^After this operation/ { print " (" download " to download, " $4 " " $5 " on the disk)" }'
 }
 
-# Masks the services of packages of the list, so that their installation starts none. The arguments
-# before `--` are put in front of the command.
-mask_services() {
-  local as_root=() package services=()
-  while [ "$1" != -- ]; do
-    as_root+=("$1")
-    shift
-  done
-  shift
+# Prints the services that the installation of packages of the list would start, one per line.
+services_of() {
+  local package
   [ -d /run/systemd/system ] || return 0
   for package in "$@"; do
-    [[ " ${service_packages[*]} " != *" $package "* ]] || services+=("$package.service")
+    [[ " ${service_packages[*]} " != *" $package "* ]] || echo "$package.service"
   done
-  [ ${#services[@]} -gt 0 ] || return 0
-  echo "Masking ${services[*]}; \`systemctl unmask\` undoes that" >&2
-  "${as_root[@]}" systemctl mask --quiet "${services[@]}"
+}
+
+# Installs packages without starting their services, which stay disabled. They are masked meanwhile
+# and unmasked in any case, also after Ctrl-C. `as_root`, of the caller, is put in front of commands.
+install_without_services() (
+  mapfile -t services < <(services_of "$@")
+  if [ ${#services[@]} -gt 0 ]; then
+    trap 'unmask_services "${services[@]}"' EXIT
+    "${as_root[@]}" systemctl mask --quiet "${services[@]}" || exit
+  fi
+  "${as_root[@]}" env DEBIAN_FRONTEND=noninteractive apt-get -o DPkg::Lock::Timeout=300 \
+    install --yes --no-install-recommends "$@" </dev/null
+)
+
+unmask_services() {
+  local service
+  "${as_root[@]}" systemctl unmask --quiet "$@"
+  for service in "$@"; do
+    # Where the installation failed, it may be unknown.
+    "${as_root[@]}" systemctl disable --quiet "$service" || true
+  done
 }
 
 # Installs the missing packages of the list, with sudo when not root. The output of apt-get is
@@ -84,9 +96,7 @@ install_packages() {
     # A machine that has just started may hold the lock while it updates itself.
     if "${as_root[@]}" apt-get update >"$log" 2>&1 &&
       echo "Installing ${#missing[@]} packages$(size_of_packages "${missing[@]}"): ${missing[*]}" >&2 &&
-      mask_services "${as_root[@]}" -- "${missing[@]}" &&
-      "${as_root[@]}" env DEBIAN_FRONTEND=noninteractive apt-get -o DPkg::Lock::Timeout=300 \
-        install --yes --no-install-recommends "${missing[@]}" >"$log" 2>&1 </dev/null; then
+      install_without_services "${missing[@]}" >"$log" 2>&1; then
       rm "$log"
       return 0
     fi
