@@ -2,12 +2,14 @@
 
 """The configuration of the trial, which is that of `deploy/` with other addresses and times.
 
-Every duration of the rules and of the routes is divided by the speed of the trial: `for`, the
-ranges and offsets in expressions, the horizon of predictions, and the waits of Alertmanager.
+Every duration of the rules and of the routes is divided by the speed of the trial: how long alerts
+are pending and keep firing, the ranges, steps and offsets in expressions, the horizon of
+predictions, and the waits of Alertmanager.
 """
 
 import pathlib
 import re
+import subprocess
 
 import yaml
 
@@ -30,7 +32,7 @@ def shorten_expression(expression, speed):
     def shortened(match):
         return match[1] + shorten(match[2] + match[3], speed)
 
-    expression = re.sub(r"(\[|offset )" + DURATION, shortened, expression)
+    expression = re.sub(r"(\[|:|offset )" + DURATION, shortened, expression)
     return re.sub(
         r"(predict_linear\([^,]*, )(\d+)\)",
         lambda match: f"{match[1]}{int(match[2]) / speed})",
@@ -46,8 +48,9 @@ def rules(file, speed):
         group.pop("interval", None)
         for rule in group["rules"]:
             rule["expr"] = shorten_expression(rule["expr"], speed)
-            if "for" in rule:
-                rule["for"] = shorten(rule["for"], speed)
+            for key in ("for", "keep_firing_for"):
+                if key in rule:
+                    rule[key] = shorten(rule[key], speed)
     return content
 
 
@@ -87,6 +90,18 @@ def alertmanager(ports, speed):
         for receiver in content["receivers"]
     ]
     return content
+
+
+def victoria_metrics(folder, ports, interval):
+    """Returns the options of VictoriaMetrics."""
+    file = DEPLOY / "victoria-metrics/victoria-metrics.default"
+    command = ("sh", "-c", '. "$1"; printf "%s\\n" $ARGS', "sh", file)
+    words = subprocess.run(command, check=True, capture_output=True, text=True).stdout.split()
+    options = dict(each.split("=", 1) for each in words)
+    options["-storageDataPath"] = folder / "victoria-metrics"
+    options["-httpListenAddr"] = f"127.0.0.1:{ports.victoria_metrics}"
+    options["-dedup.minScrapeInterval"] = f"{interval}s"
+    return [f"{name}={value}" for name, value in options.items()]
 
 
 def targets(racks, port):

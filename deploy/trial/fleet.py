@@ -2,8 +2,13 @@
 
 """A fleet on loopback addresses: servers, Prometheus, Alertmanager and VictoriaMetrics."""
 
+import contextlib
 import json
+import os
 import pathlib
+import signal
+import socket
+import tempfile
 import time
 import urllib.parse
 import urllib.request
@@ -18,6 +23,9 @@ from trial.services import Services
 
 RACKS = 5
 DAEMONS = ("prometheus", "prometheus-alertmanager", "victoria-metrics")
+ENDING_SIGNALS = (signal.SIGINT, signal.SIGTERM, signal.SIGHUP)
+# Loopback addresses have no proxy.
+OPENER = urllib.request.build_opener(urllib.request.ProxyHandler({}))
 
 
 class Ports(NamedTuple):
@@ -37,7 +45,7 @@ class Options:
     folder: pathlib.Path
     sensorctl: pathlib.Path
     machines: int = 50
-    first_port: int = 9090
+    first_port: int = 19090
     speed: float = 60
     interval: int = 5
     rule_interval: int = 5
@@ -49,28 +57,32 @@ class Failure(Exception):
 
 
 class Fleet:
-    """Starts a fleet, moves its sensors, and ends it."""
+    """Starts a fleet, moves its sensors, and ends it.
+
+    `on_message` is called with the minute and the message that Alertmanager has sent.
+    """
 
     def __init__(self, options, on_message):
         self.options = options
         self.ports = Ports(*range(options.first_port, options.first_port + len(Ports._fields)))
+        for port in self.ports:
+            check_is_free(port)
         self.folder = options.folder
-        # The servers, which do not stay root, read the models.
-        self.folder.chmod(0o755)
         for name in ("logs", "models"):
             (self.folder / name).mkdir(exist_ok=True)
+        # The servers, which do not stay root, read the models.
+        (self.folder / "models").chmod(0o755)
         self.racks = self._make_racks()
         self.machines = [machine for rack in self.racks for machine in rack]
         self.incidents = incidents_of(self.racks) if options.has_incidents else []
         self.services = Services(self.folder / "logs")
         configuration.write_all(self.folder, options, self.ports, self.racks)
         credentials.make(self.folder)
-        try:
-            self.receiver = Receiver(self.ports.receiver, on_message)
-        except OSError as error:
-            raise Failure(f"port {self.ports.receiver}: {error.strerror}") from error
         self._begin = time.monotonic()
         self._moved = 0.0
+        self.receiver = Receiver(
+            self.ports.receiver, lambda message: on_message(self.minute, message)
+        )
 
     def start(self):
         """Starts everything, waits until it is ready, and lets the time of the trial begin."""
@@ -81,8 +93,7 @@ class Fleet:
             "victoria-metrics",
             [
                 "victoria-metrics",
-                f"-storageDataPath={self.folder}/victoria-metrics",
-                f"-httpListenAddr=127.0.0.1:{self.ports.victoria_metrics}",
+                *configuration.victoria_metrics(self.folder, self.ports, self.options.interval),
                 "-search.latencyOffset=1s",
                 "-loggerLevel=WARN",
             ],
@@ -144,7 +155,10 @@ class Fleet:
             raise Failure(text)
 
     def stop(self):
-        self.services.stop()
+        # While it ends, Prometheus sends its last samples to VictoriaMetrics.
+        if self.services.is_running("prometheus"):
+            self.services.stop("prometheus")
+        self.services.close()
         self.receiver.close()
 
     def query(self, expression, at=None, port=None):
@@ -189,18 +203,58 @@ class Fleet:
         while time.monotonic() < end:
             self.check()
             try:
-                with urllib.request.urlopen(f"http://127.0.0.1:{port}{path}", timeout=5):
-                    return
+                get(port, path)
+                return
             except OSError:
                 time.sleep(0.1)
         raise Failure(f"nothing is ready at port {port}")
+
+
+@contextlib.contextmanager
+def running(options, on_message):
+    """Runs a fleet, which a signal ends in order: Ctrl-C, or a terminal that is closed."""
+    for number in ENDING_SIGNALS:
+        signal.signal(number, signal.default_int_handler)
+    fleet = Fleet(options, on_message)
+    try:
+        fleet.start()
+        yield fleet
+    finally:
+        # The end is not interrupted by a second Ctrl-C.
+        for number in ENDING_SIGNALS:
+            signal.signal(number, signal.SIG_IGN)
+        fleet.stop()
+
+
+@contextlib.contextmanager
+def temporary_folder():
+    """Makes a folder, in which the servers, which do not stay root, can read the models."""
+    with tempfile.TemporaryDirectory(prefix="sensor-profile-") as folder:
+        os.chmod(folder, 0o755)
+        yield pathlib.Path(folder)
+
+
+def check_is_free(port):
+    """Raises Failure where a server listens at the port, such as a service of a package."""
+    with socket.socket() as server:
+        server.setsockopt(socket.SOL_SOCKET, socket.SO_REUSEADDR, 1)
+        try:
+            server.bind(("127.0.0.1", port))
+        except OSError as error:
+            raise Failure(f"port {port}: {error.strerror}") from error
 
 
 def name_of(machine):
     return f"machine-{machine.number}"
 
 
-def get_json(port, path):
+def get(port, path, method="GET"):
+    """Returns the body of an answer of a program on this machine."""
+    request = urllib.request.Request(f"http://127.0.0.1:{port}{path}", method=method)
+    with OPENER.open(request, timeout=30) as response:
+        return response.read().decode()
+
+
+def get_json(port, path, method="GET"):
     """Returns the data of an answer of the interface of Prometheus."""
-    with urllib.request.urlopen(f"http://127.0.0.1:{port}{path}", timeout=30) as response:
-        return json.load(response)["data"]
+    return json.loads(get(port, path, method))["data"]

@@ -4,10 +4,10 @@
 
 from dataclasses import dataclass
 
-from trial.machine import Machine, first_limit
+from trial.machine import Machine
 
 # After this many minutes, the incidents begin again.
-CYCLE = 90
+CYCLE = 180
 
 
 @dataclass(frozen=True)
@@ -33,14 +33,19 @@ class Incident:
 
 
 class HeatWave(Incident):
-    """Temperatures rise beyond their critical limits within half an hour, stay and fall."""
+    """Temperatures rise towards their limits for some time, until the cooling fails."""
+
+    rise = 75
 
     def _changed(self, nodes, minute):
-        wave = min(1, (minute - self.begin) / 30, (self.end - minute) / 10)
+        part = (minute - self.begin) / self.rise
         for node in nodes:
-            limit = first_limit(node, "upperCritical", "upperNonCritical")
-            if node["type"] == "temperature" and limit is not None:
-                node["reading"] = round(node["reading"] + wave * (1.1 * limit - node["reading"]), 2)
+            limits = [node[each] for each in ("upperNonCritical", "upperCritical") if each in node]
+            if node["type"] == "temperature" and limits:
+                rise = part * (0.98 * min(limits) - node["reading"])
+                node["reading"] = round(
+                    node["reading"] + rise if part < 1 else 1.1 * max(limits), 2
+                )
         return nodes
 
 
@@ -90,7 +95,7 @@ def incidents_of(racks):
     heat = frozenset({"TemperatureCritical", "HeadroomGone"})
     return [
         StoppedFan((with_fan,), 15, 55, frozenset({"FanStopped"})),
-        HeatWave(tuple(racks[1]), 10, 60, heat),
+        HeatWave(tuple(racks[1]), 5, 102, heat),
         LostSensor((racks[2][0],), 20, 55, frozenset({"SensorLost"})),
         LostChip((racks[3][0],), 25, 55, frozenset({"ChipGone"})),
         SwitchedOff((racks[4][0],), 20, 55, frozenset({"MachineGone"})),

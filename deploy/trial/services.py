@@ -3,14 +3,33 @@
 """The processes of the trial."""
 
 import subprocess
+import sys
+
+# Reads the identifier of each process when it starts, and again when it has ended. At the end of
+# its input, which comes when the trial ends or is killed, it terminates the processes that are left.
+GUARD = """
+import contextlib, os, signal, sys
+running = set()
+for line in sys.stdin:
+    running ^= {int(line)}
+for each in running:
+    with contextlib.suppress(ProcessLookupError):
+        os.kill(each, signal.SIGTERM)
+"""
 
 
 class Services:
-    """Starts processes and ends them. Each writes to a log file of its name."""
+    """Starts processes and ends them. Each writes to a log file of its name.
+
+    Processes do not outlive the trial, also when that is killed.
+    """
 
     def __init__(self, logs):
         self._logs = logs
         self._processes = {}
+        self._guard = subprocess.Popen(
+            [sys.executable, "-c", GUARD], stdin=subprocess.PIPE, text=True, start_new_session=True
+        )
 
     def start(self, name, command):
         with open(self._logs / f"{name}.log", "ab") as log:
@@ -22,6 +41,7 @@ class Services:
                 stderr=log,
                 start_new_session=True,
             )
+        self._tell_guard(self._processes[name])
 
     def pid(self, name):
         return self._processes[name].pid
@@ -38,8 +58,8 @@ class Services:
         return None
 
     def stop(self, *names):
-        """Ends the processes of these names; without names, all of them."""
-        stopped = [self._processes.pop(name) for name in names or list(self._processes)]
+        """Ends the processes of these names."""
+        stopped = [self._processes.pop(name) for name in names]
         for process in stopped:
             process.terminate()
         for process in stopped:
@@ -48,8 +68,18 @@ class Services:
             except subprocess.TimeoutExpired:
                 process.kill()
                 process.wait()
+            self._tell_guard(process)
 
     def kill(self, name):
         process = self._processes.pop(name)
         process.kill()
         process.wait()
+        self._tell_guard(process)
+
+    def close(self):
+        """Ends all processes."""
+        self.stop(*self._processes)
+        self._guard.communicate()
+
+    def _tell_guard(self, process):
+        print(process.pid, file=self._guard.stdin, flush=True)
