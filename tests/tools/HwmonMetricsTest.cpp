@@ -54,6 +54,23 @@ void expectSame(const std::map<Labeled, double>& ours, const std::map<Labeled, d
         EXPECT_TRUE(theirs.contains(series)) << "too many: " << textOf(series);
 }
 
+std::string scrape(const ServerProcess& server)
+{
+    HttpClient client(server.port());
+    client.send("GET /metrics HTTP/1.1\r\nHost: localhost\r\n\r\n");
+    return client.receive().body;
+}
+
+// Returns the devices of the chips.
+std::map<std::string, std::string> devicesIn(const std::string& text)
+{
+    std::map<std::string, std::string> devices;
+    for (const Series& each : seriesIn(text))
+        if (each.name == "sensor_profile_health")
+            devices[each.labels.at("chip")] = each.labels.at("device");
+    return devices;
+}
+
 std::string compatible()
 {
     return run({"metrics", "--compatible", "node_exporter"}).out;
@@ -124,7 +141,9 @@ TEST_F(HwmonMetricsTest, NodeExporterHasTheSameSeriesOfEveryAttribute)
             if (sensor != "pwm1" || element != "input") // pwm1 is an attribute itself
                 add("hwmon0/" + sensor + "_" + element, std::to_string(++value));
     for (const std::string attribute :
-        {"pwm1", "vrm", "update_interval", "beep_enable", "alarms", "uevent", "in_reset"})
+        {"pwm1", "vrm", "update_interval", "beep_enable", "alarms", "uevent", "in_reset",
+            "temp1_a-b", "temp1_A", "temp1_x.y", "temp1_é", "temp1-b", "TEMP1_input", "temp1_ALARM",
+            "fan1_Input", "fan1_MIN", "power1_Accuracy", "temp3_Label", "temp5_input_"})
         add("hwmon0/" + attribute, "1");
     expectSame(hwmonSeriesIn(compatible()), hwmonSeriesIn(NodeExporter().metrics()));
 }
@@ -162,15 +181,9 @@ TEST_F(HwmonMetricsTest, NodeExporterHasTheSameSeriesOfOddChips)
 TEST_F(HwmonMetricsTest, ServerHasThoseOfNodeExporterOnRequest)
 {
     bind("laptop");
-    const auto scrape = [](const std::vector<std::string>& arguments) {
-        const ServerProcess server(arguments);
-        HttpClient client(server.port());
-        client.send("GET /metrics HTTP/1.1\r\nHost: localhost\r\n\r\n");
-        return client.receive().body;
-    };
-    EXPECT_EQ(
-        hwmonSeriesIn(scrape({"--compatible", "node_exporter"})), hwmonSeriesIn(compatible()));
-    EXPECT_TRUE(hwmonSeriesIn(scrape({})).empty());
+    EXPECT_EQ(hwmonSeriesIn(scrape(ServerProcess({"--compatible", "node_exporter"}))),
+        hwmonSeriesIn(compatible()));
+    EXPECT_TRUE(hwmonSeriesIn(scrape(ServerProcess({}))).empty());
     EXPECT_EQ(run({"metrics", "--compatible", "another"}).code, 2);
 }
 
@@ -183,6 +196,34 @@ TEST_F(HwmonMetricsTest, DeviceBehindAChipIsALabel)
     EXPECT_THAT(run({"metrics"}).out,
         HasSubstr("sensor_profile_reading_celsius{device_id=\"temp1:/hwmon/nvme-pci-0100/temp1\","
                   "chip=\"nvme-pci-0100\",device=\"SOLIDIGM \\\"X\\\"\",label=\"temp1\"} 41\n"));
+}
+
+TEST_F(HwmonMetricsTest, DevicesAreThoseOfThePresentChips)
+{
+    using Devices = std::map<std::string, std::string>;
+    bind("");
+    const auto addDisk = [this](const std::string& model) {
+        sysfs_->addChip("hwmon0", "nvme", "pci", "0000:01:00.0");
+        add("hwmon0/temp1_input", "41000");
+        add("hwmon0/device/model", model);
+    };
+    addDisk("first");
+    sysfs_->addChip("hwmon1", "nic", "pci", "0000:02:00.0");
+    add("hwmon1/temp1_input", "42000");
+    const ServerProcess server({});
+    EXPECT_EQ(
+        devicesIn(scrape(server)), (Devices{{"nvme-pci-0100", "first"}, {"nic-pci-0200", ""}}));
+    std::filesystem::create_directories(sysfs_->path("devices/0000:02:00.0/net/eth0"));
+    EXPECT_EQ(devicesIn(scrape(server)).at("nic-pci-0200"), "eth0");
+    sysfs_->rename("devices/0000:02:00.0/net/eth0", "devices/0000:02:00.0/net/enp2s0");
+    EXPECT_EQ(devicesIn(scrape(server)).at("nic-pci-0200"), "enp2s0");
+    std::filesystem::create_directories(sysfs_->path("devices/0000:02:00.0/net/enp2s0f1"));
+    EXPECT_EQ(devicesIn(scrape(server)).at("nic-pci-0200"), "enp2s0"); // the first by name
+
+    sysfs_->rename("hwmon/hwmon0", "gone"); // its inode stays in use
+    std::filesystem::remove_all(sysfs_->path("devices/0000:01:00.0"));
+    addDisk("second");
+    EXPECT_EQ(devicesIn(scrape(server)).at("nvme-pci-0100"), "second");
 }
 
 } // namespace

@@ -40,7 +40,9 @@ public:
     ExitCode run(Output& out) override
     {
         source_.selectMachine();
-        const Harvest harvest = readHarvest(ProviderClient(source_.providerFiles()).manager());
+        ChipDevices devices;
+        const Harvest harvest =
+            readHarvest(ProviderClient(source_.providerFiles()).manager(), devices);
         Exposition exposition(ExpositionForm::text);
         addHarvest(exposition, harvest);
         if (compatible_ && SourceOptions::readsHwmon())

@@ -164,8 +164,10 @@ public:
             Vorn::getSystemName, options_.operations);
         MemoryReturn memoryReturn(objects);
         RequestCounts operations(memoryReturn);
-        SingleFlight<Harvest> harvests(
-            [&objects] { return std::make_shared<const Harvest>(readHarvest(objects.manager())); });
+        ChipDevices devices;
+        SingleFlight<Harvest> harvests([&objects, &devices] {
+            return std::make_shared<const Harvest>(readHarvest(objects.manager(), devices));
+        });
         Host::Http::ResponseCounts responses;
         MetricsResource metrics(harvests, [&](Exposition& exposition) {
             operations.addTo(exposition);

@@ -2,13 +2,12 @@
 
 #include "tools/metrics/HwmonMetrics.h"
 
-#include "tools/sensors/FolderEntries.h"
+#include "tools/sensors/HwmonFiles.h"
 
 #include <algorithm>
 #include <array>
 #include <charconv>
 #include <filesystem>
-#include <fstream>
 #include <map>
 #include <optional>
 #include <string>
@@ -22,7 +21,8 @@ namespace {
 
 namespace Files = std::filesystem;
 
-constexpr const char* hwmonFolder = "/sys/class/hwmon";
+constexpr const char* help =
+    "Values of an attribute in /sys/class/hwmon, named and labelled as node_exporter does.";
 
 // The kernel's unit of an attribute, as a part of the unit of its series.
 enum class Scale { one, milli, micro };
@@ -85,6 +85,20 @@ constexpr std::array chipAttributes = {ChipAttribute{"beep_enable", "beep_enable
     ChipAttribute{"update_interval", "update_interval_seconds", Scale::milli},
     ChipAttribute{"vrm", "voltage_regulator_version"}};
 
+// Returns the text as the exporter spells names.
+std::string cleaned(std::string_view text)
+{
+    std::string name(text);
+    for (char& c : name) {
+        c = c >= 'A' && c <= 'Z' ? static_cast<char>(c - 'A' + 'a') : c;
+        const bool isKept = (c >= 'a' && c <= 'z') || (c >= '0' && c <= '9') || c == ':';
+        c = isKept ? c : '_';
+    }
+    name.erase(0, std::min(name.find_first_not_of('_'), name.size()));
+    name.erase(name.find_last_not_of('_') + 1);
+    return name;
+}
+
 // An attribute such as temp1_max: the element max of the sensor temp1.
 struct Attribute {
     std::string sensor;
@@ -116,37 +130,10 @@ std::optional<Attribute> attributeOf(std::string_view name)
     const Unit unit = own == elements.end() ? known->second : own->unit;
     std::string metric(kind);
     if (!element.empty() && element != "input")
-        (metric += '_') += element;
+        (metric += '_') += cleaned(element);
     metric += unit.suffix;
     return Attribute{
         std::string(name.substr(0, sensorEnd)), std::string(element), metric, unit.scale};
-}
-
-// Returns the text as the exporter spells names in labels.
-std::string cleaned(std::string_view text)
-{
-    std::string name(text);
-    for (char& c : name) {
-        c = c >= 'A' && c <= 'Z' ? static_cast<char>(c - 'A' + 'a') : c;
-        const bool isKept = (c >= 'a' && c <= 'z') || (c >= '0' && c <= '9') || c == ':';
-        c = isKept ? c : '_';
-    }
-    name.erase(0, std::min(name.find_first_not_of('_'), name.size()));
-    name.erase(name.find_last_not_of('_') + 1);
-    return name;
-}
-
-// Returns the content of a file without line feeds at its end; nothing when it cannot be read.
-std::optional<std::string> contentOf(const Files::path& file)
-{
-    std::ifstream in(file, std::ios::binary);
-    std::array<char, 4096> content{}; // attributes are no longer
-    in.read(content.data(), content.size());
-    if (in.bad() || !in.eof())
-        return std::nullopt;
-    std::string text(content.data(), static_cast<std::size_t>(in.gcount()));
-    text.erase(text.find_last_not_of('\n') + 1);
-    return text;
 }
 
 std::optional<double> numberIn(const Files::path& file)
@@ -180,7 +167,7 @@ public:
         const std::string chip = chipOf(folder, name);
         if (!name.empty())
             add("chip_names", Labels().add("chip", chip).add("chip_name", name), 1);
-        // Those of the device have precedence. Drivers of old put all there.
+        // Old drivers have their attributes in the folder of the device, which has precedence.
         for (const Files::path& place : {folder / "device", folder})
             for (const std::string& entry : entriesOf(place.string()))
                 if (const auto attribute = attributeOf(entry))
@@ -192,8 +179,8 @@ public:
         for (const auto& [metric, family] : families_) {
             const std::string name = "node_hwmon_" + metric;
             const bool isCounter = metric.ends_with("_total");
-            exposition.begin({name, "As node_exporter has it.",
-                isCounter ? MetricFamily::Type::counter : MetricFamily::Type::gauge});
+            exposition.begin(
+                {name, help, isCounter ? MetricFamily::Type::counter : MetricFamily::Type::gauge});
             for (const auto& [labels, value] : family)
                 exposition.add(labels, value);
         }

@@ -6,9 +6,9 @@
 
 namespace Tools {
 
-// Adds what node_exporter's collector of hwmon has of the present machine, with its names and
-// labels, so that dashboards that were made for it continue to work: each attribute in
-// /sys/class/hwmon as a series, without the configuration of libsensors.
+// Adds the series that node_exporter's collector of hwmon publishes on the present machine, so that
+// dashboards that were made for it continue to work: one for each attribute in /sys/class/hwmon,
+// without the configuration of libsensors.
 void addHwmon(Exposition& exposition);
 
 } // namespace Tools

@@ -3,19 +3,17 @@
 #include "tools/sensors/ChipDevices.h"
 
 #include "platform/text/Trim.h"
-#include "tools/sensors/FolderEntries.h"
+#include "tools/sensors/HwmonFiles.h"
 
 #include <algorithm>
 #include <array>
 #include <cstdio>
 #include <filesystem>
-#include <fstream>
-#include <map>
-#include <memory>
 #include <optional>
 #include <set>
 #include <string_view>
-#include <vector>
+#include <system_error>
+#include <utility>
 
 namespace Tools {
 
@@ -23,16 +21,13 @@ namespace {
 
 namespace Files = std::filesystem;
 
-constexpr const char* folderOfChips = "/sys/class/hwmon";
 constexpr const char* slotFolder = "/sys/bus/pci/slots";
 
 // Returns the first line of a file; an empty text when there is none.
 std::string lineIn(const std::string& file)
 {
-    std::ifstream stream(file);
-    std::string line;
-    std::getline(stream, line);
-    return std::string(Text::trimmed(line));
+    const std::string text = contentOf(file).value_or("");
+    return std::string(Text::trimmed(text.substr(0, text.find('\n'))));
 }
 
 template <typename... Numbers>
@@ -45,7 +40,7 @@ std::string formatted(const char* format, Numbers... numbers)
 
 // Returns what libsensors appends to the names of chips with that device, which the kernel names by
 // its address on a SCSI or PCI bus. Returns nothing for other names.
-std::optional<std::string> addressIn(const std::string& device)
+std::optional<std::string> suffixFor(const std::string& device)
 {
     unsigned first = 0;
     unsigned second = 0;
@@ -63,51 +58,57 @@ std::optional<std::string> addressIn(const std::string& device)
     return std::nullopt;
 }
 
-// Returns the name of the slot of the PCI device at the address, such as "0000:03:00.0".
-std::string slotOf(const std::string& address)
-{
-    for (const std::string& slot : entriesOf(slotFolder)) {
-        const std::string place =
-            lineIn(std::string(slotFolder).append("/").append(slot).append("/address"));
-        if (!place.empty() && address.starts_with(place + "."))
-            return "PCI slot " + slot;
-    }
-    return "";
-}
-
-// Returns what the device of a chip is, or that with the address which it belongs to.
-std::string deviceIn(const std::string& folder, const Files::path& addressed)
-{
-    for (const char* const attribute : {"/model", "/model_name"})
-        if (std::string model = lineIn(folder + attribute); !model.empty())
-            return model;
-    for (const std::string& place : {folder, addressed.string()})
-        if (const auto interfaces = entriesOf(place + "/net"); !interfaces.empty())
-            return interfaces.front();
-    return slotOf(addressed.filename().string());
-}
-
-// Adds the device of the chip in the folder to those by the name of the chip.
-void addDevice(
-    std::map<std::string, std::string>& devices, const std::string& folder, const std::string& name)
-{
-    const std::string device = folder + "/device";
-    std::error_code failure;
-    const Files::path real = Files::canonical(device, failure);
-    if (failure)
-        return;
-    // A class device, such as that of a controller, may stand between the chip and its address.
-    for (Files::path place = real; place.has_relative_path(); place = place.parent_path())
-        if (const auto suffix = addressIn(place.filename().string())) {
-            devices.emplace(name + *suffix, deviceIn(device, place));
-            return;
-        }
-    devices.emplace(name + "-acpi-0", deviceIn(device, real));
-}
-
 } // namespace
 
-void nameDevices(Sensors& sensors)
+ChipDevices::Chip ChipDevices::chipIn(const std::string& folder)
+{
+    Chip chip;
+    std::error_code failure;
+    const Files::path real = Files::canonical(folder + "/device", failure);
+    if (failure)
+        return chip;
+    chip.suffix = "-acpi-0";
+    chip.addressed = real;
+    // A class device, such as that of a controller, may stand between the chip and its address.
+    for (Files::path place = real; place.has_relative_path(); place = place.parent_path())
+        if (const auto suffix = suffixFor(place.filename().string())) {
+            chip.suffix = *suffix;
+            chip.addressed = place;
+            break;
+        }
+    chip.model = lineIn(folder + "/device/model");
+    if (chip.model.empty())
+        chip.model = lineIn(folder + "/device/model_name");
+    return chip;
+}
+
+// Looks for network interfaces each time, as udev renames them while their chip stays.
+std::string ChipDevices::deviceOf(const Chip& chip, const std::string& folder) const
+{
+    if (!chip.model.empty())
+        return chip.model;
+    for (const std::string& place : {folder + "/device", chip.addressed})
+        if (const auto interfaces = entriesOf(place + "/net"); !interfaces.empty())
+            return *std::min_element(interfaces.begin(), interfaces.end());
+    const std::string address = Files::path(chip.addressed).filename();
+    const auto slot = slotAt_.find(address.substr(0, address.rfind('.')));
+    return slot == slotAt_.end() ? "" : "PCI slot " + slot->second;
+}
+
+void ChipDevices::renewSlots()
+{
+    auto slots = entriesOf(slotFolder);
+    if (slots == slots_)
+        return;
+    slots_ = std::move(slots);
+    slotAt_.clear();
+    for (const std::string& slot : slots_)
+        if (std::string address = lineIn(std::string(slotFolder) + "/" + slot + "/address");
+            !address.empty())
+            slotAt_.emplace(std::move(address), slot);
+}
+
+void ChipDevices::nameIn(Sensors& sensors)
 {
     constexpr std::array<std::string_view, 3> buses = {"-scsi-", "-pci-", "-acpi-"};
     std::set<std::string> named; // the beginnings of names of chips that may have a device
@@ -117,15 +118,31 @@ void nameDevices(Sensors& sensors)
                 named.insert(sensor.chip.substr(0, end));
     if (named.empty())
         return;
-    std::map<std::string, std::string> devices;
-    for (const std::string& entry : entriesOf(folderOfChips)) {
-        const std::string folder = std::string(folderOfChips).append("/").append(entry);
-        if (const std::string name = lineIn(folder + "/name"); named.contains(name))
-            addDevice(devices, folder, name);
+    renewSlots();
+    std::map<std::string, Known> present;
+    std::map<std::string, std::string> devices; // by the name of the chip
+    for (const std::string& entry : entriesOf(hwmonFolder)) {
+        const std::string folder = std::string(hwmonFolder).append("/").append(entry);
+        const auto id = Vorn::Hwmon::folderId(folder);
+        if (!id)
+            continue;
+        const auto before = known_.find(entry);
+        Known& known = present[entry];
+        if (before != known_.end() && before->second.id == *id)
+            known = std::move(before->second);
+        else
+            known = {*id, lineIn(folder + "/name"), std::nullopt};
+        if (!named.contains(known.name))
+            continue;
+        if (!known.chip)
+            known.chip = chipIn(folder);
+        if (!known.chip->suffix.empty())
+            devices.emplace(known.name + known.chip->suffix, deviceOf(*known.chip, folder));
     }
     for (Sensor& sensor : sensors)
         if (const auto device = devices.find(sensor.chip); device != devices.end())
             sensor.device = device->second;
+    known_ = std::move(present);
 }
 
 std::string otherChannels()
@@ -142,9 +159,8 @@ std::string otherChannels()
         OtherKind{"intrusion", "_alarm", "intrusion"}};
     std::set<std::string> channels;
     std::set<std::string> kinds;
-    for (const std::string& chip : entriesOf(folderOfChips))
-        for (const std::string& name :
-            entriesOf(std::string(folderOfChips).append("/").append(chip)))
+    for (const std::string& chip : entriesOf(hwmonFolder))
+        for (const std::string& name : entriesOf(std::string(hwmonFolder).append("/").append(chip)))
             for (const OtherKind& each : otherKinds)
                 if (name.starts_with(each.attribute) && name.ends_with(each.suffix)) {
                     channels.insert(chip + name.substr(0, name.size() - each.suffix.size()));

@@ -7,11 +7,8 @@
 #include "host/manager/Manager.h"
 #include "platform/instrumentation/OpenSource.h"
 #include "platform/instrumentation/hwmon/Machine.h"
-#include "platform/text/Escape.h"
-#include "platform/text/Utf8.h"
 #include "tools/SourceOptions.h"
 #include "tools/cim/ProviderClient.h"
-#include "tools/sensors/ChipDevices.h"
 
 #include <exception>
 #include <map>
@@ -45,12 +42,6 @@ Sensors readSensors(const Host::Manager& manager)
     }
 }
 
-// Returns the node's DeviceID.
-std::string identifierOf(const Vorn::Node& node)
-{
-    return node.description + ":" + Text::escapeControls(Text::toValidUtf8(node.path));
-}
-
 using Identifiers = std::unordered_set<std::string_view>;
 
 // Returns whether the source can be listed and the harvest has all its sensors. The provider
@@ -65,7 +56,7 @@ bool isUp(const Vorn::SourceEntry& entry, const Identifiers& harvested)
         const auto source = Vorn::openSource(entry);
         for (const NodeType type : {NodeType::Temperature, NodeType::Voltage, NodeType::Tachometer})
             for (const Vorn::Node& node : source->nodes(type))
-                if (!harvested.contains(identifierOf(node)))
+                if (!harvested.contains(deviceIdOf(node.description, node.path)))
                     return false;
         return true;
     } catch (const std::exception&) {
@@ -89,12 +80,12 @@ std::map<std::string, bool> statesOfSources(const Sensors& sensors)
 
 } // namespace
 
-Harvest readHarvest(const Host::Manager& manager)
+Harvest readHarvest(const Host::Manager& manager, ChipDevices& devices)
 {
     const auto begin = std::chrono::steady_clock::now();
     Harvest harvest{readSensors(manager), {}};
     if (SourceOptions::readsHwmon())
-        nameDevices(harvest.sensors);
+        devices.nameIn(harvest.sensors);
     harvest.sources = statesOfSources(harvest.sensors);
     harvest.duration = std::chrono::steady_clock::now() - begin;
     return harvest;

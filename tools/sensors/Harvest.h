@@ -2,6 +2,7 @@
 
 #pragma once
 
+#include "tools/sensors/ChipDevices.h"
 #include "tools/sensors/SensorList.h"
 
 #include <chrono>
@@ -18,12 +19,13 @@ namespace Tools {
 struct Harvest {
     Sensors sensors;
     // The sources of VORN_INSTRUMENTATION, such as "hwmon" or "model:FILE", and whether each could
-    // be read and all its sensors are here.
+    // be read and no sensor of it is missing.
     std::map<std::string, bool> sources;
     std::chrono::duration<double> duration{};
 };
 
-// Reads all sensors through the provider. Where that fails, the harvest has those that it returned.
-Harvest readHarvest(const Host::Manager& manager);
+// Reads all sensors through the provider. Where a source fails, the harvest has those of the
+// others.
+Harvest readHarvest(const Host::Manager& manager, ChipDevices& devices);
 
 } // namespace Tools

@@ -4,6 +4,9 @@
 
 #include "host/broker/Array.h"
 #include "host/broker/Instance.h"
+#include "platform/text/Escape.h"
+#include "platform/text/Utf8.h"
+#include "platform/utilities/ProviderUtilities.h"
 #include "tools/cim/Units.h"
 
 #include <algorithm>
@@ -119,12 +122,7 @@ Sensor::Sensor(const Host::Instance& from)
       unit(unitSymbol(static_cast<std::uint64_t>(numberIn(from, "BaseUnits").value_or(0)))),
       instance(&from)
 {
-    const std::string_view name = textIn(from, "ElementName");
-    const std::string_view id = textIn(from, "DeviceID");
-    const bool isNamed = id.size() > name.size() && id.starts_with(name) && id[name.size()] == ':';
-    setNames(name, isNamed ? id.substr(name.size() + 1) : id);
-    deviceId = id;
-
+    identify(textIn(from, "ElementName"), textIn(from, "DeviceID"));
     const std::vector<unsigned> statuses = operationalStatusesOf(from);
     const auto has = [&](unsigned status) {
         return std::find(statuses.begin(), statuses.end(), status) != statuses.end();
@@ -142,13 +140,28 @@ Sensor::Sensor(const Host::Instance& from)
         limits.at(i) = quantityIn(from, limitKinds.at(i).property, modifier);
 }
 
-void Sensor::setNames(std::string_view itsLabel, std::string_view itsPath)
+std::string deviceIdOf(const std::string& description, std::string_view path)
 {
-    label = itsLabel;
-    path = itsPath;
-    deviceId = label + ":" + path;
+    return Vorn::stripSpaces(description + ":" + Text::escapeControls(Text::toValidUtf8(path)));
+}
+
+void Sensor::setNames(const std::string& description, std::string_view itsPath)
+{
+    identify(Vorn::stripSpaces(description), deviceIdOf(description, itsPath));
+}
+
+// The identifier consists of the description, which the name is without blanks at its ends, and the
+// path.
+void Sensor::identify(std::string_view elementName, std::string_view id)
+{
+    label = elementName;
+    deviceId = id;
+    const std::string_view more = id.starts_with(label) ? id.substr(label.size()) : "";
+    const auto colon = more.find_first_not_of(" \t");
+    const bool isNamed = colon != std::string_view::npos && more[colon] == ':';
+    path = isNamed ? more.substr(colon + 1) : id;
     constexpr std::string_view hwmon = "/hwmon/";
-    std::string_view rest = itsPath;
+    std::string_view rest = path;
     rest.remove_prefix(rest.starts_with(hwmon) ? hwmon.size() : rest.starts_with('/') ? 1 : 0);
     // The rest of the path of a management controller's sensor is an address in several parts.
     const auto slash = rest.starts_with("ipmi/") ? rest.find('/') : rest.rfind('/');

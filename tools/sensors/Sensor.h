@@ -49,14 +49,17 @@ inline constexpr std::array<LimitKind, 6> limitKinds = {{
 }};
 inline constexpr std::size_t firstUpperLimit = 3;
 
+// Returns the DeviceID that the provider gives a node.
+std::string deviceIdOf(const std::string& description, std::string_view path);
+
 // Texts are as the provider spells them: not yet printable.
 struct Sensor {
     Sensor() = default;
     // Interprets an instance of ZUMLO_NumericSensor.
     explicit Sensor(const Host::Instance& from);
 
-    // Sets the identifier by what it consists of: label and path.
-    void setNames(std::string_view itsLabel, std::string_view itsPath);
+    // Sets the names that the provider gives a node.
+    void setNames(const std::string& description, std::string_view itsPath);
 
     std::string label;
     std::string path;    // such as "/hwmon/coretemp-isa-0000/temp1"
@@ -77,6 +80,9 @@ struct Sensor {
     std::vector<std::string_view> possibleStates; // words of states, from PossibleStates
     unsigned health = 0;                          // HealthState
     const Host::Instance* instance = nullptr;     // null when made of no instance
+
+private:
+    void identify(std::string_view elementName, std::string_view id);
 };
 
 inline constexpr std::array<const char*, 3> sensorKinds = {"temperature", "voltage", "fan"};

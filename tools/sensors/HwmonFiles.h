@@ -1,14 +1,21 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
+// Files and folders of sysfs.
+
 #pragma once
 
 #include <dirent.h>
 
+#include <array>
+#include <fstream>
 #include <memory>
+#include <optional>
 #include <string>
 #include <vector>
 
 namespace Tools {
+
+inline constexpr const char* hwmonFolder = "/sys/class/hwmon";
 
 // Returns the names in a folder that are not hidden, in the kernel's order; none when it cannot be
 // read.
@@ -22,6 +29,20 @@ inline std::vector<std::string> entriesOf(const std::string& folder)
         if (entry->d_name[0] != '.')
             names.emplace_back(entry->d_name);
     return names;
+}
+
+// Returns the content of an attribute without line feeds at its end; nothing when it cannot be
+// read.
+inline std::optional<std::string> contentOf(const std::string& file)
+{
+    std::ifstream in(file, std::ios::binary);
+    std::array<char, 4096> content{}; // attributes are no longer
+    in.read(content.data(), content.size());
+    if (in.bad() || !in.eof())
+        return std::nullopt;
+    std::string text(content.data(), static_cast<std::size_t>(in.gcount()));
+    text.erase(text.find_last_not_of('\n') + 1);
+    return text;
 }
 
 } // namespace Tools
