@@ -3,6 +3,7 @@
 #include "tools/SourceOptions.h"
 
 #include "platform/instrumentation/Instrumentation.h"
+#include "platform/instrumentation/OpenSource.h"
 #include "platform/instrumentation/ipmi/IpmiSource.h"
 #include "platform/instrumentation/machinefile/MachineFileSource.h"
 #include "tools/cim/ProviderFile.h"
@@ -67,19 +68,17 @@ std::string SourceOptions::ageOfCollection()
     return "";
 }
 
-std::vector<std::string> SourceOptions::failuresOfCollections()
+std::vector<std::string> SourceOptions::failures(bool areChipsListed)
 {
-    std::vector<std::string> failures;
-    for (const Vorn::SourceEntry& entry : sources()) {
-        if (entry.scheme != "ipmi")
-            continue;
+    std::vector<std::string> reasons;
+    for (const Vorn::SourceEntry& entry : sources())
         try {
-            const Vorn::IpmiSource source(entry.argument);
+            if (entry.scheme != "hwmon" || !areChipsListed)
+                Vorn::openSource(entry)->nodes(Vorn::NodeLexicon::NodeType::Temperature);
         } catch (const std::exception& error) {
-            failures.emplace_back(error.what());
+            reasons.emplace_back(error.what());
         }
-    }
-    return failures;
+    return reasons;
 }
 
 ProviderFiles SourceOptions::providerFiles() const

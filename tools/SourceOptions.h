@@ -43,9 +43,10 @@ public:
     // empty text where the machine has none, or where they cannot be read.
     static std::string ageOfCollection();
 
-    // Returns the reasons why sensors of management controllers cannot be read. The provider
-    // publishes the others then.
-    static std::vector<std::string> failuresOfCollections();
+    // Returns the reasons why sources cannot be used, of which the provider publishes no sensors.
+    // Skips the chips where they are listed, since that is expensive. REQUIRES: selectMachine() was
+    // called.
+    static std::vector<std::string> failures(bool areChipsListed);
 
     // Throws std::runtime_error when no library is given and none is found.
     ProviderFiles providerFiles() const;

@@ -83,6 +83,7 @@ struct Instrumentation::State {
     };
 
     std::vector<OpenSource> sources;
+    std::exception_ptr openFailure; // of the first source that could not be opened
     NodeType type{};
     std::size_t place = 0;              // the source of the node under the cursor
     std::size_t index = 0;              // the node's index among those of its source
@@ -92,6 +93,7 @@ struct Instrumentation::State {
     void select(NodeType selected);
     void advance();
     void passFinishedSources();
+    static bool haveNodes(const std::vector<OpenSource*>& listed);
     bool isOnNode() const { return place < sources.size(); }
     const Node& node() const { return sources.at(place).nodes.at(index); }
     const NodeReading& visit();
@@ -108,11 +110,12 @@ Instrumentation::State::State()
                 entry.text, {SourceStep::Stage::Opening, {}}, [&] { return openSource(entry); });
             sources.push_back({entry.text, std::move(source), {}});
         } catch (const std::exception&) {
-            // The sensors of other sources do not depend on the file of another process.
-            if (entry.scheme != "ipmi")
-                throw;
+            if (!openFailure)
+                openFailure = std::current_exception();
         }
     }
+    if (sources.empty() && openFailure)
+        std::rethrow_exception(openFailure);
     place = sources.size();
 }
 
@@ -121,12 +124,40 @@ void Instrumentation::State::select(NodeType selected)
     place = sources.size(); // stays past the last node where a source fails
     reading.reset();
     type = selected;
-    for (OpenSource& open : sources)
-        open.nodes = attempt(open.entry, {SourceStep::Stage::Listing, selected},
-            [&] { return open.source->nodes(selected); });
+    std::exception_ptr failure = openFailure;
+    std::vector<OpenSource*> listed;
+    for (OpenSource& open : sources) {
+        open.nodes.clear();
+        try {
+            open.nodes = attempt(open.entry, {SourceStep::Stage::Listing, selected},
+                [&] { return open.source->nodes(selected); });
+            listed.push_back(&open);
+        } catch (const std::exception&) {
+            if (!failure)
+                failure = std::current_exception();
+        }
+    }
+    if (failure && !haveNodes(listed))
+        std::rethrow_exception(failure);
     place = 0;
     index = 0;
     passFinishedSources();
+}
+
+// Returns whether one of the sources has nodes of any type.
+bool Instrumentation::State::haveNodes(const std::vector<OpenSource*>& listed)
+{
+    for (const OpenSource* const open : listed)
+        if (!open->nodes.empty())
+            return true;
+    for (const OpenSource* const open : listed)
+        for (const NodeType each : {NodeType::Temperature, NodeType::Voltage, NodeType::Tachometer})
+            try {
+                if (!open->source->nodes(each).empty())
+                    return true;
+            } catch (const std::exception&) { // it has failed since
+            }
+    return false;
 }
 
 void Instrumentation::State::advance()

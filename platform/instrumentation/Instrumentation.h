@@ -16,6 +16,7 @@ namespace Vorn {
 // that status and properties of one visit belong together. Throws standard exceptions only; a
 // source that cannot be used throws a std::runtime_error that says where and why, from the
 // constructor or from selectNode(), and is reported once on the log channel.
+// Where other sources have nodes of any type, one that cannot be used is only reported.
 // Not thread-safe; any number of cursors may be in use at once.
 class Instrumentation {
 public:

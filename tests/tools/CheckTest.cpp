@@ -33,6 +33,18 @@ protected:
     }
 };
 
+TEST_F(CheckTest, SourceThatCannotBeUsedIsUnknown)
+{
+    const std::string whole = model(
+        R"({ "type": "temperature", "path": "/a", "description": "A", "status": 1, "reading": 7 })");
+    const std::string broken = folder_.write("broken.json", "{");
+    const Ended ended = run({"check"},
+        {.environment = {{"VORN_INSTRUMENTATION", "model:" + whole + ",model:" + broken}}});
+    EXPECT_EQ(ended.code, 3);
+    EXPECT_THAT(ended.out, HasSubstr(broken));
+    EXPECT_THAT(ended.out, HasSubstr("A'=7")); // the others are judged
+}
+
 TEST_F(CheckTest, WorstSensorDecidesAndComesFirst)
 {
     const Ended ended = checked();

@@ -154,29 +154,69 @@ TEST_F(MetricsTest, MachineWithoutSensorsIsTold)
     EXPECT_THAT(ended.err, HasSubstr("this machine has no sensors"));
 }
 
-TEST_F(MetricsTest, HarvestThatFailsInTheMiddleGivesWhatIsThere)
+// Returns the metrics of the sources.
+std::string metricsOfSources(const std::string& list)
 {
-    const std::string broken = folder_.write("broken.json", "{");
-    const std::string whole = smallModel();
-    const std::string refused = folder_.write("refused.json", R"({ "nodes": [
-        { "type": "voltage", "path": "/a", "description": "" },
-        { "type": "temperature", "path": "/b", "description": "B" }]})");
-    const auto up = [](const std::string& text) {
-        std::vector<double> values;
+    return run({"metrics"}, {.environment = {{"VORN_INSTRUMENTATION", list}}}).out;
+}
+
+// Returns which sources are up.
+std::map<std::string, double> sourcesIn(const std::string& text)
+{
+    std::map<std::string, double> states;
+    for (const Series& each : seriesIn(text))
+        if (each.name == "sensor_profile_source_up") {
+            EXPECT_TRUE(states.emplace(each.labels.at("source"), each.value).second);
+        }
+    return states;
+}
+
+using States = std::map<std::string, double>;
+
+TEST_F(MetricsTest, SourceThatFailsTakesNoSensorsOfOthersAway)
+{
+    const std::string broken = "model:" + folder_.write("broken.json", "{");
+    const std::string whole = "model:" + smallModel();
+    const std::string damaged = "ipmi:" + folder_.write("ipmi.json", "{");
+    for (const std::string& list :
+        {whole + "," + broken, broken + "," + whole, whole + "," + damaged}) {
+        const std::string text = metricsOfSources(list);
+        States expected{{whole, 1}, {broken, 0}};
+        if (list.ends_with(damaged))
+            expected = {{whole, 1}, {damaged, 0}};
+        EXPECT_EQ(sourcesIn(text), expected);
+        std::set<std::string> sensors;
         for (const Series& each : seriesIn(text))
-            if (each.name == "sensor_profile_source_up")
-                values.push_back(each.value);
-        return values;
-    };
-    const auto of = [](const std::string& sources) {
-        return run({"metrics"}, {.environment = {{"VORN_INSTRUMENTATION", sources}}}).out;
-    };
-    EXPECT_EQ(up(of("model:" + whole)), std::vector<double>{1});
-    EXPECT_EQ(up(of("model:" + whole + ",model:" + broken)), (std::vector<double>{0, 0}));
-    EXPECT_EQ(up(of("model:" + whole + ",model:" + whole)), std::vector<double>{1}); // once
-    const std::string partly = of("model:" + refused);
-    EXPECT_EQ(up(partly), std::vector<double>{0});
-    EXPECT_THAT(partly, HasSubstr("\nsensor_profile_sensors{kind=\"temperature\"} 1\n"));
+            if (each.name == "sensor_profile_health")
+                sensors.insert(each.labels.at("device_id"));
+        EXPECT_EQ(sensors, (std::set<std::string>{"CPU 1:/cpu0/temp1", "CPU 2:/cpu1/temp1",
+                               "+12V:/board/in1", "Fan:/board/fan1", "Fan:/board/fan2"}))
+            << list;
+    }
+    EXPECT_EQ(sourcesIn(metricsOfSources(whole + "," + whole)), (States{{whole, 1}}));
+    EXPECT_EQ(sourcesIn(metricsOfSources(broken)), (States{{broken, 0}}));
+}
+
+TEST_F(MetricsTest, OddDescriptionsAreThoseOfTheProvider)
+{
+    const nlohmann::json machine = {
+        {"nodes", {{{"type", "temperature"}, {"path", "/c/a"}, {"description", " A"}},
+                      {{"type", "temperature"}, {"path", "/c/b"}, {"description", "B \t"}},
+                      {{"type", "temperature"}, {"path", "/c/c "}, {"description", "C: x:"}},
+                      {{"type", "temperature"}, {"path", "/c\n/d"}, {"description", "D\n"}},
+                      {{"type", "temperature"}, {"path", "e"}, {"description", ":"}}}}};
+    const std::string source = "model:" + folder_.write("odd.json", machine.dump());
+    const std::string text = metricsOfSources(source);
+    EXPECT_EQ(sourcesIn(text), (States{{source, 1}}));
+    std::map<std::string, std::string> chips;
+    for (const Series& each : seriesIn(text))
+        if (each.name == "sensor_profile_health")
+            chips[each.labels.at("device_id")] = each.labels.at("chip");
+    EXPECT_EQ(chips, (std::map<std::string, std::string>{{"A:/c/a", "c"}, {"B \t:/c/b", "c"},
+                         {"C: x::/c/c", "c"}, {"D\n:/c\\n/d", "c\\n"}, {"::e", "/"}}));
+    const std::string expected = source.substr(source.find('/'));
+    const Ended ended = run({"check", "--model", expected, "--expect", expected});
+    EXPECT_THAT(ended.out, Not(HasSubstr("missing")));
 }
 
 // ---- The server ----

@@ -100,8 +100,10 @@ public:
                 if (std::none_of(all.begin(), all.end(),
                         [&](const Sensor& sensor) { return selects(each.selector, sensor); }))
                     report.add(CheckStatus::unknown, nothingMatches(each.selector, all));
-        for (const std::string& failure : SourceOptions::failuresOfCollections())
-            report.add(CheckStatus::unknown, failure);
+        const bool areChipsListed = std::any_of(all.begin(), all.end(),
+            [](const Sensor& sensor) { return sensor.path.starts_with("/hwmon/"); });
+        for (const std::string& reason : SourceOptions::failures(areChipsListed))
+            report.add(CheckStatus::unknown, reason);
         if (all.empty())
             report.add(CheckStatus::unknown, "this machine has no sensors");
         else

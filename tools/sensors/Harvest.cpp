@@ -45,7 +45,7 @@ Sensors readSensors(const Host::Manager& manager)
 using Identifiers = std::unordered_set<std::string_view>;
 
 // Returns whether the source can be listed and the harvest has all its sensors. The provider
-// returns no error where a source cannot be read, nor where it refuses a sensor.
+// returns no error where a source cannot be read or breaks off.
 bool isUp(const Vorn::SourceEntry& entry, const Identifiers& harvested)
 {
     try {

@@ -19,6 +19,7 @@ using Testing::EnvironmentVariable;
 using Testing::errorOf;
 using testing::IsEmpty;
 using Testing::LogCapture;
+using testing::Not;
 using Testing::ScriptedMachine;
 using testing::SizeIs;
 using Testing::walk;
@@ -237,6 +238,42 @@ TEST_F(FailureTest, AtConstructionIsReportedOnce)
     request();
     EXPECT_THAT(textsOf(capture),
         ElementsAre("source \"scripted\" cannot be used: scripted: construction"));
+}
+
+// Has nodes of one type.
+class VoltageSource final : public Vorn::Source {
+public:
+    std::vector<Vorn::Node> nodes(NodeType type) override
+    {
+        return type == NodeType::Voltage ? std::vector<Vorn::Node>{{"/v", "V", 21, 0}}
+                                         : std::vector<Vorn::Node>{};
+    }
+    Vorn::NodeReading read(const Vorn::Node&) override { return {}; }
+};
+
+TEST_F(FailureTest, OfOneSourceTakesNoNodesOfOthersAway)
+{
+    Testing::provideSource("volts", [] { return std::make_unique<VoltageSource>(); });
+    for (const bool failsAtOnce : {true, false}) {
+        const LogCapture capture;
+        ScriptedMachine machine;
+        machine.failConstruction(failsAtOnce);
+        machine.failSelection(NodeType::Voltage);
+        machine.failSelection(NodeType::Temperature);
+        for (const std::string list : {"scripted,volts", "volts,scripted"}) {
+            const EnvironmentVariable both("VORN_INSTRUMENTATION", list);
+            Instrumentation cursor;
+            cursor.selectNode(NodeType::Voltage);
+            ASSERT_TRUE(cursor) << list;
+            EXPECT_EQ(cursor.getPathToNode(), "/v");
+            EXPECT_FALSE(++cursor);
+            EXPECT_NO_THROW(cursor.selectNode(NodeType::Temperature)) << list;
+            EXPECT_FALSE(cursor);
+        }
+        EXPECT_THAT(textsOf(capture), Not(IsEmpty()));
+        const EnvironmentVariable alone("VORN_INSTRUMENTATION", "scripted,scripted");
+        EXPECT_THROW(Instrumentation().selectNode(NodeType::Temperature), std::runtime_error);
+    }
 }
 
 TEST_F(FailureTest, ThatComesBackIsReportedAgain)

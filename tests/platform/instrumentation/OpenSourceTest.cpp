@@ -15,7 +15,7 @@ using Vorn::Instrumentation;
 
 TEST(OpenSourceTest, NamesAnUnknownKindOfSource)
 {
-    const EnvironmentVariable environment("VORN_INSTRUMENTATION", "hwmon,ipmb:3");
+    const EnvironmentVariable environment("VORN_INSTRUMENTATION", "ipmb:3");
     EXPECT_THAT(errorOf([] { Instrumentation cursor; }),
         testing::AllOf(HasSubstr("\"ipmb:3\""), HasSubstr("hwmon, ipmi, model")));
 }
