@@ -219,13 +219,13 @@ protected:
             root_.path() / "etc/systemd/system/multi-user.target.wants/sensor-profile.service");
     }
 
-    // Returns the calls of systemctl since the last time.
-    std::vector<std::string> callsOfSystemctl() const
+    // Returns the calls of systemctl and udevadm since the last time.
+    std::vector<std::string> calls() const
     {
         const fs::path file = root_.path() / "calls";
-        std::vector<std::string> calls = linesOf(contentOf(file));
+        std::vector<std::string> lines = linesOf(contentOf(file));
         fs::remove(file);
-        return calls;
+        return lines;
     }
 
     // Returns the files and folders that the packages brought, without those of rpm and the lists
@@ -293,8 +293,9 @@ TEST_F(RpmRootTest, ServiceHasAUserAndIsNotStarted)
     EXPECT_THAT(contentOf(root_.path() / "etc/passwd"),
         ContainsRegex("sensor-profile:[^\n]*:Sensor profile service:[^\n]*/nologin\n"));
     EXPECT_FALSE(isEnabled());
-    EXPECT_THAT(callsOfSystemctl(),
-        ElementsAre("--no-reload preset sensor-profile.service", "daemon-reload"));
+    EXPECT_THAT(calls(),
+        ElementsAre("--no-reload preset sensor-profile.service", "daemon-reload",
+            "udevadm control --reload", "udevadm trigger --subsystem-match=ipmi"));
 }
 
 TEST_F(RpmRootTest, ServiceIsEnabledWhereTheDistributionPresetsIt)
@@ -307,7 +308,7 @@ TEST_F(RpmRootTest, ServiceIsEnabledWhereTheDistributionPresetsIt)
 
 TEST_F(RpmRootTest, InstallsWhereSystemdDoesNotRun)
 {
-    for (const char* const program : {"systemctl", "systemd-sysusers"})
+    for (const char* const program : {"systemctl", "systemd-sysusers", "udevadm"})
         std::ofstream(root_.path() / "usr/bin" / program) << "#!/bin/sh\nexit 1\n";
     rpm("-i " + packages().files());
     rpm("-e " + provider + " " + tool);
@@ -320,12 +321,13 @@ TEST_F(RpmRootTest, UpgradeKeepsSettingsAndRestartsTheService)
     rpm("-i " + packages().files());
     inRoot("systemctl enable sensor-profile && echo 'port = 1' >>/" + settings);
     const std::string changed = contentOf(root_.path() / settings);
-    callsOfSystemctl();
+    calls();
     rpm("-U " + higher.files());
     EXPECT_EQ(contentOf(root_.path() / settings), changed);
     EXPECT_TRUE(isEnabled());
-    EXPECT_THAT(callsOfSystemctl(),
-        ElementsAre("daemon-reload", "daemon-reload",
+    EXPECT_THAT(calls(),
+        ElementsAre("daemon-reload", "udevadm control --reload",
+            "udevadm trigger --subsystem-match=ipmi", "daemon-reload",
             "try-restart sensor-profile.service sensor-profile-collect.service"));
     EXPECT_EQ(
         rpm("-q " + tool), tool + "-" SENSOR_PROFILE_VERSION "-2." SENSOR_PROFILE_PROCESSOR "\n");
@@ -335,11 +337,11 @@ TEST_F(RpmRootTest, RemovalLeavesChangedSettingsOnly)
 {
     rpm("-i " + packages().files());
     inRoot("systemctl enable sensor-profile && echo 'port = 1' >>/" + settings);
-    callsOfSystemctl();
+    calls();
     const Ended ended = tryRpm("-e " + provider + " " + tool);
     EXPECT_EQ(ended.code, 0);
     EXPECT_THAT(ended.err, HasSubstr("saved as /" + settings + ".rpmsave"));
-    EXPECT_THAT(callsOfSystemctl(),
+    EXPECT_THAT(calls(),
         ElementsAre("--no-reload disable --now sensor-profile.service",
             "stop sensor-profile-collect.service",
             "clean --what=runtime sensor-profile-collect.service", "daemon-reload"));
