@@ -65,7 +65,7 @@ double linearized(double y, Linearization code)
         return std::pow(10.0, y);
     case 6:
         return std::exp2(y);
-    case 7:
+    case reciprocal:
         return 1.0 / y;
     case 8:
         return y * y;

@@ -27,14 +27,6 @@ using std::chrono::milliseconds;
     throw std::system_error(errno, std::generic_category(), devicePath);
 }
 
-Vorn::Descriptor openDevice()
-{
-    Vorn::Descriptor file(::open(devicePath, O_RDWR | O_CLOEXEC));
-    if (!file.isOpen())
-        fail();
-    return file;
-}
-
 // Waits until there is something to read. Returns false at the end of the timeout.
 bool waitForInput(int file, milliseconds timeout)
 {
@@ -49,7 +41,15 @@ bool waitForInput(int file, milliseconds timeout)
 
 } // namespace
 
-IpmiDevice::IpmiDevice() : file_(openDevice()) {}
+IpmiDevice::IpmiDevice() : file_(::open(devicePath, O_RDWR | O_CLOEXEC))
+{
+    if (file_.isOpen() && ::flock(file_.number(), LOCK_EX | LOCK_NB) == 0)
+        return;
+    if (errno == EWOULDBLOCK)
+        throw std::runtime_error(
+            std::string("another process reads the sensors of ") + devicePath + " already");
+    fail();
+}
 
 Bytes IpmiDevice::send(const Command& command, milliseconds timeout)
 {
@@ -118,16 +118,6 @@ Bytes IpmiDevice::receive()
         return {};
     const std::size_t size = std::min<std::size_t>(received.msg.data_len, data.size());
     return {data.begin(), data.begin() + size};
-}
-
-IpmiDeviceLock::IpmiDeviceLock() : file_(openDevice())
-{
-    if (::flock(file_.number(), LOCK_EX | LOCK_NB) == 0)
-        return;
-    if (errno == EWOULDBLOCK)
-        throw std::runtime_error(
-            std::string("another process reads the sensors of ") + devicePath + " already");
-    fail();
 }
 
 } // namespace Ipmi

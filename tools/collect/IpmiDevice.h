@@ -10,10 +10,12 @@ namespace Ipmi {
 inline constexpr const char* devicePath = "/dev/ipmi0";
 
 // The kernel's interface to the BMC of this machine (linux/ipmi.h), which also bridges commands to
-// satellites. Used by one thread.
+// satellites. Keeps other collectors from the device during its lifetime, since each of them would
+// cost the BMC as many commands. Used by one thread.
 class IpmiDevice final : public Transport {
 public:
-    // Throws std::system_error naming the device.
+    // Throws std::system_error naming the device, and std::runtime_error when another process has
+    // it.
     IpmiDevice();
 
     Bytes send(const Command& command, std::chrono::milliseconds timeout) override;
@@ -24,18 +26,6 @@ private:
 
     Vorn::Descriptor file_;
     long lastMessage_ = 0; // its number distinguishes an answer from late ones
-};
-
-// Keeps other collectors from the device during its lifetime: each of them would cost the BMC as
-// many commands.
-class IpmiDeviceLock {
-public:
-    // Throws std::system_error naming the device, and std::runtime_error when another process has
-    // the lock.
-    IpmiDeviceLock();
-
-private:
-    Vorn::Descriptor file_;
 };
 
 } // namespace Ipmi

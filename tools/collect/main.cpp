@@ -16,10 +16,12 @@
 
 #include <algorithm>
 #include <chrono>
+#include <csignal>
 #include <cstdlib>
 #include <filesystem>
 #include <optional>
 #include <string>
+#include <system_error>
 #include <thread>
 #include <utility>
 
@@ -69,7 +71,7 @@ public:
     // Writes the file once, or again and again. Throws std::exception where it cannot begin.
     void run()
     {
-        const Ipmi::IpmiDeviceLock lock;
+        device_.emplace();
         if (options_.file == Vorn::defaultCollection)
             makeReadableFolder(std::filesystem::path(options_.file).parent_path());
         prepareRenewal(options_.file);
@@ -121,9 +123,14 @@ private:
     {
         constexpr int shareOfTime = 5; // a slow BMC is used for a fifth of the time at most
         const auto begin = std::chrono::steady_clock::now();
-        // The device is opened for each pass, since the kernel may have removed it meanwhile.
-        Ipmi::IpmiDevice device;
-        collector.pass(device, period_);
+        if (!device_)
+            device_.emplace();
+        try {
+            collector.pass(*device_, period_);
+        } catch (const std::system_error&) {
+            device_.reset(); // the kernel may have removed it
+            throw;
+        }
         readAt_ = Vorn::secondsSinceStart();
         period_ =
             std::max<Period>(interval(), shareOfTime * (std::chrono::steady_clock::now() - begin));
@@ -143,6 +150,7 @@ private:
     }
 
     const CollectOptions& options_;
+    std::optional<Ipmi::IpmiDevice> device_; // open between passes, too, for its lock
     Period period_{};
     std::optional<double> readAt_; // the end of the last pass that the BMC answered
 };
@@ -165,6 +173,7 @@ int collect(int argc, const char* const* argv)
 
 int main(int argc, char** argv)
 {
+    std::signal(SIGPIPE, SIG_IGN); // the reader of standard error may end first
     try {
         return collect(argc, argv);
     } catch (const std::exception& error) {

@@ -3,9 +3,11 @@
 // Preloaded into a reader of /dev/ipmi0, it connects the device to the system interface of ipmi_sim
 // at the loopback port SIMULATED_BMC. Each command takes SIMULATED_BMC_DELAY milliseconds more. As
 // the kernel does, it bridges commands to satellites by Send Message and Get Message (IPMI 2.0,
-// sections 22.6 and 22.7), and the device of a BMC that is gone opens and stays silent. Commands to
-// satellites fail with the error number SIMULATED_SATELLITE_ERROR. A lock of the device is a name
-// that one socket at a time can have. Where SIMULATED_CLOCK_JUMPS is set, the clock of the day
+// sections 22.6 and 22.7), and the device of a BMC that is gone opens and stays silent. While there
+// is a file SIMULATED_REMOVAL, the kernel has removed the device. Commands to satellites fail with
+// the error number SIMULATED_SATELLITE_ERROR. Where SIMULATED_LATE_ANSWERS is
+// set, one to the command before is received before each answer. A lock of the device is a name
+// that one process at a time can have. Where SIMULATED_CLOCK_JUMPS is set, the clock of the day
 // jumps back by an hour each time it is read.
 
 #include <arpa/inet.h>
@@ -69,6 +71,28 @@ std::uint8_t checksum(const Bytes& bytes, std::size_t from)
         -std::accumulate(bytes.begin() + static_cast<std::ptrdiff_t>(from), bytes.end(), 0));
 }
 
+// Returns a socket; a descriptor that is never readable where the BMC is gone.
+int connectedSocket()
+{
+    sockaddr_in address{};
+    address.sin_family = AF_INET;
+    address.sin_port = htons(static_cast<std::uint16_t>(std::atoi(std::getenv("SIMULATED_BMC"))));
+    address.sin_addr.s_addr = htonl(INADDR_LOOPBACK);
+    const int socket = ::socket(AF_INET, SOCK_STREAM | SOCK_CLOEXEC, 0);
+    if (::connect(socket, reinterpret_cast<sockaddr*>(&address), sizeof address) == 0)
+        return socket;
+    ::close(socket);
+    return ::eventfd(0, EFD_CLOEXEC);
+}
+
+// Connects the device to a BMC that has restarted.
+void reconnect()
+{
+    const int socket = connectedSocket();
+    ::dup3(socket, device.socket, O_CLOEXEC);
+    ::close(socket);
+}
+
 void send(const Request& request, std::uint8_t lun, std::uint8_t netFunction, std::uint8_t command,
     const Bytes& data)
 {
@@ -86,7 +110,13 @@ void send(const Request& request, std::uint8_t lun, std::uint8_t netFunction, st
         frame.push_back(isSpecial ? byte | 0x10U : byte);
     }
     frame.push_back(endOfMessage);
-    (void)::send(device.socket, frame.data(), frame.size(), MSG_NOSIGNAL);
+    const auto write = [&] {
+        return ::send(device.socket, frame.data(), frame.size(), MSG_NOSIGNAL);
+    };
+    if (write() < 0) {
+        reconnect();
+        (void)write();
+    }
 }
 
 std::optional<std::uint8_t> nextByte()
@@ -198,9 +228,22 @@ std::optional<Answer> nextAnswer()
     return bridged ? std::optional(Answer{request, *std::move(bridged)}) : std::nullopt;
 }
 
+// Returns an answer of zeros to the command before, in every other call.
+std::optional<Answer> lateAnswer()
+{
+    static bool isDue = false;
+    isDue = !isDue;
+    if (!isDue || std::getenv("SIMULATED_LATE_ANSWERS") == nullptr)
+        return std::nullopt;
+    Request request = device.requests.at(device.sequence);
+    --request.id;
+    return Answer{request, Bytes(16)};
+}
+
 int deliver(ipmi_recv& received)
 {
-    const auto answer = nextAnswer();
+    const auto late = lateAnswer();
+    const auto answer = late ? late : nextAnswer();
     if (!answer) {
         ::usleep(1000); // a closed socket is always readable
         errno = EAGAIN;
@@ -219,35 +262,24 @@ int deliver(ipmi_recv& received)
     return 0;
 }
 
-int openDevice(const char* port)
-{
-    sockaddr_in address{};
-    address.sin_family = AF_INET;
-    address.sin_port = htons(static_cast<std::uint16_t>(std::atoi(port)));
-    address.sin_addr.s_addr = htonl(INADDR_LOOPBACK);
-    device.socket = ::socket(AF_INET, SOCK_STREAM | SOCK_CLOEXEC, 0);
-    if (::connect(device.socket, reinterpret_cast<sockaddr*>(&address), sizeof address) != 0) {
-        ::close(device.socket);
-        device.socket = ::eventfd(0, EFD_CLOEXEC); // is never readable
-    }
-    return device.socket;
-}
-
-// Binds a socket to a name in the place of the device, which this closes.
+// Binds a socket to a name, which this process has until its end.
 int lockDevice()
 {
+    static int lock = -1;
+    if (lock >= 0)
+        return 0;
     sockaddr_un name{};
     name.sun_family = AF_UNIX;
     const std::string text = std::string("simulated-bmc-") + std::getenv("SIMULATED_BMC");
     text.copy(name.sun_path + 1, text.size()); // an abstract name begins with NUL
     const auto size = static_cast<socklen_t>(offsetof(sockaddr_un, sun_path) + 1 + text.size());
-    const int lock = ::socket(AF_UNIX, SOCK_DGRAM | SOCK_CLOEXEC, 0);
-    const int result = ::bind(lock, reinterpret_cast<const sockaddr*>(&name), size);
-    ::dup3(lock, device.socket, O_CLOEXEC);
+    lock = ::socket(AF_UNIX, SOCK_DGRAM | SOCK_CLOEXEC, 0);
+    if (::bind(lock, reinterpret_cast<const sockaddr*>(&name), size) == 0)
+        return 0;
     ::close(lock);
-    device.socket = -1;
+    lock = -1;
     errno = EWOULDBLOCK;
-    return result;
+    return -1;
 }
 
 template <typename Function>
@@ -256,11 +288,20 @@ Function next(const char* name)
     return reinterpret_cast<Function>(::dlsym(RTLD_NEXT, name));
 }
 
+bool isRemoved()
+{
+    const char* const file = std::getenv("SIMULATED_REMOVAL");
+    return file != nullptr && ::access(file, F_OK) == 0;
+}
+
 int openOr(const char* function, const char* path, int flags, mode_t mode)
 {
-    const char* const port = std::getenv("SIMULATED_BMC");
-    if (port != nullptr && std::strcmp(path, "/dev/ipmi0") == 0)
-        return openDevice(port);
+    if (std::getenv("SIMULATED_BMC") != nullptr && std::strcmp(path, "/dev/ipmi0") == 0) {
+        if (!isRemoved())
+            return device.socket = connectedSocket();
+        errno = ENOENT;
+        return -1;
+    }
     return next<int (*)(const char*, int, ...)>(function)(path, flags, mode);
 }
 
@@ -303,6 +344,10 @@ EXPORTED int ioctl(int file, unsigned long request, ...) noexcept
     va_end(arguments);
     if (file < 0 || file != device.socket)
         return next<int (*)(int, unsigned long, ...)>("ioctl")(file, request, argument);
+    if (isRemoved()) {
+        errno = ENODEV;
+        return -1;
+    }
     switch (request) {
     case IPMICTL_SEND_COMMAND:
         return submit(*static_cast<const ipmi_req*>(argument));

@@ -11,7 +11,10 @@
 #include <gmock/gmock.h>
 #include <nlohmann/json.hpp>
 
+#include <sys/stat.h>
+
 #include <algorithm>
+#include <filesystem>
 #include <optional>
 
 namespace BothSourcesTests {
@@ -28,6 +31,7 @@ protected:
         if (IsSkipped() || HasFailure())
             return;
         machine_.emplace();
+        ::umask(077);
         const Ended ended = Testing::run(
             {"collect", "--once"}, {.environment = machine_->controller.environment()});
         ASSERT_EQ(ended.code, 0) << ended.err;
@@ -79,6 +83,9 @@ TEST_F(BothSourcesTest, ListHasAGroupForEachChipAndForTheController)
     EXPECT_THAT(ended.out, HasSubstr("\ncoretemp-isa-0000"));
     EXPECT_THAT(ended.out, ContainsRegex("\nipmi +\\(read [0-9]+ s ago\\)\n"));
     EXPECT_THAT(ended.out, ContainsRegex("\n  CPU1 Temp +58 "));
+    // Whatever the umask, everybody can enter the folder.
+    EXPECT_EQ(
+        std::filesystem::status("/run/sensor-profile").permissions(), std::filesystem::perms(0755));
 }
 
 TEST_F(BothSourcesTest, AFileThatCannotBeReadTakesNoSensorsOfTheKernelAway)

@@ -92,6 +92,20 @@ TEST_F(CollectProcessTest, AControllerThatRestartsInTheMiddleOfAPassIsReadAgain)
     ASSERT_TRUE(waitForStatus("CPU1 Temp", 1)) << errors();
 }
 
+TEST_F(CollectProcessTest, ADeviceThatTheKernelRemovesIsReadAgainWhenItIsBack)
+{
+    const std::filesystem::path removal = folder_.path() / "removal";
+    start({{"SIMULATED_REMOVAL", removal.string()}});
+    folder_.write("removal", "");
+    ASSERT_TRUE(waitForStatus("CPU1 Temp", 13)) << errors();
+    const std::string failure = "sensorctl: /dev/ipmi0: No such ";
+    ASSERT_TRUE(waitUntil([&] {
+        return errors() == failure + "device\n" + failure + "file or directory\n";
+    })) << errors();
+    std::filesystem::remove(removal);
+    ASSERT_TRUE(waitForStatus("CPU1 Temp", 1)) << errors();
+}
+
 TEST_F(CollectProcessTest, ASensorThatWasReadBeforeIsLostWhenItIsUnavailable)
 {
     start();

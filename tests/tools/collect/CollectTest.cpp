@@ -84,6 +84,11 @@ TEST_F(CollectTest, ASlowControllerIsReadInTheSameWay)
     EXPECT_GT(file.renewal.value().period, 30);
 }
 
+TEST_F(CollectTest, LateAnswersAreDiscarded)
+{
+    expectServer(collect({}, {{"SIMULATED_LATE_ANSWERS", "1"}}));
+}
+
 // A controller whose state bits are set to each of them in turn.
 TEST_F(CollectTest, EachAlarmOfTheControllerIsAStatus)
 {

@@ -36,6 +36,21 @@ TEST_F(CollectorTest, ReadsThresholdsAgainInTurn)
     EXPECT_EQ(collector_.nodes().at(1).values.upperNonCritical, 70);
 }
 
+TEST_F(CollectorTest, ReadsMoreThresholdsInAPassWhereThereAreFewerPasses)
+{
+    FakeController controller(
+        {temperature("A", 1), temperature("B", 2), temperature("C", 3), temperature("D", 4)});
+    const std::pair<int, std::size_t> rows[] = {
+        {1, 1}, {10, 1}, {75, 1}, {150, 2}, {225, 3}, {300, 4}, {3600, 4}};
+    for (const auto& [seconds, thresholds] : rows) {
+        collector_.pass(controller, std::chrono::seconds(seconds));
+        const std::size_t before = controller.count(CommandCode::getSensorThresholds);
+        collector_.pass(controller, std::chrono::seconds(seconds));
+        EXPECT_EQ(controller.count(CommandCode::getSensorThresholds) - before, thresholds)
+            << seconds;
+    }
+}
+
 TEST_F(CollectorTest, TakesTheThresholdsOfTheRecordWhereTheControllerHasNone)
 {
     for (const Bytes& answer : {Bytes{0xC1}, Bytes{0xCC}, Bytes{0, 8, 1}}) {

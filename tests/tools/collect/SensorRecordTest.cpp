@@ -105,6 +105,12 @@ TEST(SensorKindTest, PublishesTemperaturesVoltagesAndFans)
         record.units.isModified = false;
         record.format = Ipmi::AnalogFormat::none;
         EXPECT_FALSE(kindOf(record));
+        record.format = Ipmi::AnalogFormat::twosComplement;
+        for (const auto& [linearization, isKnown] :
+            {std::pair(11, true), {12, false}, {0x6F, false}, {0x70, true}, {0x7F, true}}) {
+            record.linearization = static_cast<Ipmi::Linearization>(linearization);
+            EXPECT_EQ(kindOf(record).has_value(), isKnown) << linearization;
+        }
     }
 }
 
@@ -115,6 +121,26 @@ TEST(SensorKindTest, DoesNotFallShortOfAWholeNumberOfThousandths)
         const long double thousandths = fromKelvins.inBaseUnit(kelvins) * 1000.0L;
         EXPECT_EQ(std::trunc(thousandths), kelvins * 1000 - 273150) << kelvins;
     }
+}
+
+// Speeds are reciprocals of times.
+TEST(SensorKindTest, DoesNotFallShortOfAWholeNumberOfRevolutions)
+{
+    constexpr Ipmi::SensorKind fan{NodeType::Tachometer};
+    int wholeNumbers = 0;
+    for (int m = 1; m < 512; ++m)
+        for (int x = 1; x < 256; ++x) {
+            constexpr int scale = 1'000'000;
+            if (scale % (m * x) != 0)
+                continue;
+            ++wholeNumbers;
+            const auto speed =
+                Ipmi::convert(static_cast<std::uint8_t>(x), Ipmi::AnalogFormat::unsignedNumber,
+                    {.m = m, .resultExponent = -6}, Ipmi::reciprocal);
+            const long double thousandths = fan.inBaseUnit(speed.value()) * 1000.0L;
+            EXPECT_EQ(std::trunc(thousandths), 1000.0L * (scale / (m * x))) << m << " " << x;
+        }
+    EXPECT_GT(wholeNumbers, 200);
 }
 
 } // namespace SensorRecordTests
