@@ -81,7 +81,7 @@ TEST(ManualOfTheToolTest, HasEveryCommandAndTheOptionsThereAre)
 // Returns the examples with output of a page, as blocks of a document for run-commands.
 std::string examplesOf(const std::string& page)
 {
-    static const std::regex block("\n\\.Bd -literal(\n\\$ [^]*?\n)\\.Ed");
+    static const std::regex block("\n\\.Bd -literal(?: -offset indent)?(\n\\$ [^]*?\n)\\.Ed");
     std::string document;
     for (std::sregex_iterator each(page.begin(), page.end(), block), end; each != end; ++each)
         document += "```text" + (*each)[1].str() + "```\n";
@@ -90,10 +90,12 @@ std::string examplesOf(const std::string& page)
     return document;
 }
 
-TEST(ManualOfTheToolTest, HasExamplesThatPrintWhatItShows)
+class ManualExamplesTest : public testing::TestWithParam<const char*> {};
+
+TEST_P(ManualExamplesTest, PrintWhatThePageShows)
 {
-    const std::string examples = examplesOf(contentOf(folder + "sensorctl.1"));
-    EXPECT_GE(countOf(examples, "```text\n$ sensorctl "), 4U);
+    const std::string examples = examplesOf(contentOf(folder + GetParam()));
+    EXPECT_GE(countOf(examples, "```text\n$ "), 4U);
     const TemporaryFolder files;
     const Ended ended = run({files.write("examples", examples)},
         {.program = SENSOR_PROFILE_SOURCE_DIR "/tests/docs/run-commands",
@@ -103,6 +105,9 @@ TEST(ManualOfTheToolTest, HasExamplesThatPrintWhatItShows)
                     "model:" SENSOR_PROFILE_SOURCE_DIR "/schema/demo-model.json"}}});
     EXPECT_EQ(ended.code, 0) << ended.out << ended.err;
 }
+
+INSTANTIATE_TEST_SUITE_P(
+    ManualPages, ManualExamplesTest, testing::Values("sensorctl.1", "sensor-profile.7"));
 
 // The settings in the file are options, and the ports have their default values.
 TEST(SettingsOfTheServiceTest, AreOptionsOfTheServer)

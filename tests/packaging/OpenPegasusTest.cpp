@@ -221,6 +221,31 @@ TEST_F(OpenPegasusTest, DryRunPrintsTheStepsAndTakesNone)
     EXPECT_EQ(links().size(), 2U);
 }
 
+// Runs the commands in the example of the manual page.
+TEST_F(OpenPegasusTest, PrintsWhatTheManualShows)
+{
+    const std::string page = replaced(
+        contentOf(SENSOR_PROFILE_SOURCE_DIR "/packaging/man/sensor-profile-register.8"), "\\", "");
+    const std::string start = ".Bd -literal\n";
+    const auto begin = page.find(start) + start.size();
+    const std::string command = "# sensor-profile-register ";
+    std::string rest; // of the output
+    std::size_t commands = 0;
+    for (const std::string& line : linesOf(page.substr(begin, page.find("\n.Ed") - begin))) {
+        if (line.starts_with(command)) {
+            std::istringstream words(line.substr(command.size()));
+            rest = "\n" + replaced(mustRun({std::istream_iterator<std::string>(words), {}}),
+                              installedFile(""), "/usr/");
+            ++commands;
+        } else if (line != "&...") {
+            const auto found = rest.find("\n" + line + "\n");
+            ASSERT_NE(found, std::string::npos) << line << rest;
+            rest = rest.substr(found + 1 + line.size());
+        }
+    }
+    EXPECT_EQ(commands, 2U);
+}
+
 // The libraries are linked into the machine's provider folder of OpenPegasus if it exists.
 TEST_F(OpenPegasusTest, WithoutAFolderTheMachinesIsTaken)
 {
