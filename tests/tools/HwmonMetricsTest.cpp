@@ -178,6 +178,35 @@ TEST_F(HwmonMetricsTest, NodeExporterHasTheSameSeriesOfOddChips)
     expectSame(hwmonSeriesIn(compatible()), hwmonSeriesIn(NodeExporter().metrics()));
 }
 
+// The exporter publishes each of two equal series once, and logs an error at every scrape.
+TEST_F(HwmonMetricsTest, TextfileStandsBesideEitherCollectorOfHwmon)
+{
+    bind("laptop");
+    const TemporaryFolder folder;
+    const auto write = [&](std::vector<std::string> options) {
+        options.insert(
+            options.begin(), {"metrics", "--textfile", (folder.path() / "sensors.prom").string()});
+        EXPECT_EQ(run(options).code, 0);
+    };
+    const std::vector<std::string> textfile = {
+        "--collector.textfile", "--collector.textfile.directory=" + folder.path().string()};
+    const auto errorsOf = [&](std::vector<std::string> collectors, std::size_t series) {
+        collectors.insert(collectors.end(), textfile.begin(), textfile.end());
+        const NodeExporter exporter(collectors);
+        const std::string text = exporter.metrics();
+        EXPECT_EQ(hwmonSeriesIn(text).size(), series);
+        EXPECT_THAT(text, HasSubstr("\nnode_textfile_scrape_error 0\n"));
+        EXPECT_THAT(text, HasSubstr("\nsensor_profile_health{"));
+        return countOf(exporter.log(), "level=error");
+    };
+    const std::size_t count = hwmonSeriesIn(compatible()).size();
+    write({});
+    EXPECT_EQ(errorsOf({"--collector.hwmon"}, count), 0U);
+    write({"--compatible", "node_exporter"});
+    EXPECT_EQ(errorsOf({"--no-collector.hwmon"}, count), 0U);
+    EXPECT_GT(errorsOf({"--collector.hwmon"}, count), 0U);
+}
+
 TEST_F(HwmonMetricsTest, ServerHasThoseOfNodeExporterOnRequest)
 {
     bind("laptop");

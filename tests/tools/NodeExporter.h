@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Runs prometheus-node-exporter with its collector of hwmon only, on the present /sys.
+// Runs prometheus-node-exporter with chosen collectors, on the present /sys.
 
 #pragma once
 
@@ -17,30 +17,31 @@
 #include <csignal>
 #include <stdexcept>
 #include <string>
+#include <vector>
 
 namespace Testing {
 
 class NodeExporter {
 public:
-    NodeExporter()
+    explicit NodeExporter(const std::vector<std::string>& collectors = {"--collector.hwmon"})
     {
+        std::vector<std::string> arguments = {"--collector.disable-defaults",
+            "--web.disable-exporter-metrics", "--web.listen-address=127.0.0.1:0"};
+        arguments.insert(arguments.end(), collectors.begin(), collectors.end());
         posix_spawn_file_actions_t actions{};
         ::posix_spawn_file_actions_init(&actions);
         ::posix_spawn_file_actions_addopen(
             &actions, STDERR_FILENO, log_.c_str(), O_WRONLY | O_CREAT, 0666);
-        const int error = spawn(process_, "/usr/bin/prometheus-node-exporter",
-            {"--collector.disable-defaults", "--collector.hwmon", "--web.disable-exporter-metrics",
-                "--web.listen-address=127.0.0.1:0"},
-            {}, actions);
+        const int error =
+            spawn(process_, "/usr/bin/prometheus-node-exporter", arguments, {}, actions);
         ::posix_spawn_file_actions_destroy(&actions);
-        if (error != 0 || !waitUntil([this] { return port() != 0; }))
-            throw std::runtime_error("prometheus-node-exporter: " + contentOf(log_));
+        if (error == 0 && waitUntil([this] { return port() != 0; }))
+            return;
+        if (error == 0)
+            end();
+        throw std::runtime_error("prometheus-node-exporter: " + log());
     }
-    ~NodeExporter()
-    {
-        ::kill(process_, SIGKILL);
-        ::waitpid(process_, nullptr, 0);
-    }
+    ~NodeExporter() { end(); }
     NodeExporter(const NodeExporter&) = delete;
     NodeExporter& operator=(const NodeExporter&) = delete;
 
@@ -51,11 +52,19 @@ public:
         return client.receive().body;
     }
 
+    std::string log() const { return contentOf(log_); }
+
 private:
+    void end() const
+    {
+        ::kill(process_, SIGKILL);
+        ::waitpid(process_, nullptr, 0);
+    }
+
     // Returns 0 until it listens.
     std::uint16_t port() const
     {
-        const std::string log = contentOf(log_);
+        const std::string log = this->log();
         const std::string before = "msg=\"Listening on\" address=127.0.0.1:";
         const std::size_t at = log.find(before);
         if (at == std::string::npos || log.find('\n', at) == std::string::npos)

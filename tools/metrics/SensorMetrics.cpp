@@ -20,13 +20,13 @@ struct Measure {
 
 constexpr auto gauge = MetricFamily::Type::gauge;
 constexpr std::array measures = {
-    Measure{sensorKinds[0], "°C",
+    Measure{"temperature", "°C",
         {"sensor_profile_reading_celsius", "Temperature that the sensor reads.", gauge, "celsius"},
         {"sensor_profile_limit_celsius", "Limit of a temperature.", gauge, "celsius"}},
-    Measure{sensorKinds[1], "V",
+    Measure{"voltage", "V",
         {"sensor_profile_reading_volts", "Voltage that the sensor reads.", gauge, "volts"},
         {"sensor_profile_limit_volts", "Limit of a voltage.", gauge, "volts"}},
-    Measure{sensorKinds[2], "RPM",
+    Measure{"fan", "RPM",
         {"sensor_profile_reading_rpm", "Revolutions per minute of a fan.", gauge, "rpm"},
         {"sensor_profile_limit_rpm", "Limit of the revolutions per minute of a fan.", gauge,
             "rpm"}}};
