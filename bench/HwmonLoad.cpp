@@ -225,10 +225,9 @@ void print(const std::vector<Row>& rows, std::size_t sensors)
     }
 }
 
-void compare(int wanted, std::size_t rounds)
+void compare(const HwmonTree& tree, std::size_t rounds)
 {
-    const HwmonTree tree(wanted);
-    const auto sensors = tree.chips().size() * HwmonTree::sensorsOfChip;
+    const std::size_t sensors = tree.sensors();
     std::size_t attributes = 0;
     for (const HwmonTree::Chip& chip : tree.chips())
         attributes += chip.attributes.size();
@@ -253,8 +252,8 @@ void compare(int wanted, std::size_t rounds)
         });
     };
     const auto getInstance = [&] {
-        provider.request(1, [](auto* mi, auto& handling, auto* result, auto& path) {
-            path.addKey("DeviceID", Host::Value::text(handling.arena(), HwmonTree::someDeviceID()));
+        provider.request(1, [&](auto* mi, auto& handling, auto* result, auto& path) {
+            path.addKey("DeviceID", Host::Value::text(handling.arena(), tree.someDeviceID()));
             return mi->ft->getInstance(
                 mi, handling.context().handle(), result, path.handle(), nullptr);
         });
@@ -302,7 +301,9 @@ int main(int argc, char** argv)
         std::puts("| sensors | what | CPU ms | wall ms | CPU us/sensor | times raw | times peer |\n"
                   "|---|---|---|---|---|---|---|");
         for (const int sensors : {100, 1000, 5000})
-            compare(sensors, static_cast<std::size_t>(rounds));
+            compare(HwmonTree(sensors), static_cast<std::size_t>(rounds));
+        std::puts("on 250 PCI chips:");
+        compare(HwmonTree(1000, HwmonTree::onPci), static_cast<std::size_t>(rounds));
         return 0;
     } catch (const std::exception& error) {
         std::fprintf(stderr, "bench_hwmon: %s\n", error.what());

@@ -7,7 +7,10 @@
 
 #include "tests/support/TemporaryFolder.h"
 
+#include <array>
 #include <cerrno>
+#include <cstddef>
+#include <cstdio>
 #include <filesystem>
 #include <string>
 #include <system_error>
@@ -19,7 +22,17 @@ namespace Bench {
 
 class HwmonTree {
 public:
-    static constexpr int sensorsOfChip = 20;
+    // How the chips are made.
+    struct Design {
+        const char* bus;
+        int temperatures;
+        int voltages;
+        int fans;
+
+        int sensors() const { return temperatures + voltages + fans; }
+    };
+    static constexpr Design large = {"platform", 7, 7, 6};
+    static constexpr Design onPci = {"pci", 4, 0, 0}; // such as those of disks and network cards
 
     struct Chip {
         std::string folder;
@@ -27,10 +40,10 @@ public:
     };
 
     // `sensors` is rounded down to whole chips.
-    explicit HwmonTree(int sensors)
+    explicit HwmonTree(int sensors, const Design& design = large) : design_(design)
     {
         std::filesystem::create_directories(folder_.path() / "hwmon");
-        for (int number = 1; number <= sensors / sensorsOfChip; ++number)
+        for (int number = 1; number <= sensors / design_.sensors(); ++number)
             chips_.push_back(layOut(number));
         if (::mount(folder_.path().c_str(), mountPoint, nullptr, MS_BIND, nullptr) != 0)
             throw std::system_error(errno, std::generic_category(), "mount over /sys/class");
@@ -40,19 +53,27 @@ public:
     HwmonTree& operator=(const HwmonTree&) = delete;
 
     const std::vector<Chip>& chips() const { return chips_; }
+    std::size_t sensors() const
+    {
+        return chips_.size() * static_cast<std::size_t>(design_.sensors());
+    }
 
     // Returns the device identifier of a sensor on the first chip.
-    static std::string someDeviceID() { return "Core 1:/hwmon/bench-isa-0001/temp1"; }
+    std::string someDeviceID() const
+    {
+        const bool isOnPci = design_.bus == std::string("pci");
+        return std::string("Core 1:/hwmon/bench-") + (isOnPci ? "pci-0008" : "isa-0001") + "/temp1";
+    }
 
 private:
     static constexpr const char* mountPoint = "/sys/class";
 
     Chip layOut(int number) const
     {
-        const std::string device = "devices/bench." + std::to_string(number);
+        const std::string device = "devices/" + addressOf(number);
         std::filesystem::create_directories(folder_.path() / device);
         std::filesystem::create_symlink(
-            "../../bus/platform", folder_.path() / device / "subsystem");
+            std::string("../../bus/") + design_.bus, folder_.path() / device / "subsystem");
         const std::string folder = "hwmon/hwmon" + std::to_string(number) + "/";
         std::filesystem::create_directories(folder_.path() / folder);
         std::filesystem::create_symlink("../../" + device, folder_.path() / (folder + "device"));
@@ -62,20 +83,22 @@ private:
             folder_.write(folder + name, std::string(value) + "\n");
             chip.attributes.push_back(name);
         };
-        for (int index = 1; index <= 7; ++index) {
+        for (int index = 1; index <= design_.temperatures; ++index) {
             const std::string temperature = "temp" + std::to_string(index);
             folder_.write(folder + temperature + "_label", "Core " + std::to_string(index) + "\n");
             add(temperature + "_input", "41000");
             add(temperature + "_max", "80000");
             add(temperature + "_crit", "95000");
             add(temperature + "_crit_alarm", "0");
+        }
+        for (int index = 1; index <= design_.voltages; ++index) {
             const std::string voltage = "in" + std::to_string(index);
             add(voltage + "_input", "1200");
             add(voltage + "_min", "1100");
             add(voltage + "_max", "1300");
             add(voltage + "_alarm", "0");
         }
-        for (int index = 1; index <= 6; ++index) {
+        for (int index = 1; index <= design_.fans; ++index) {
             const std::string fan = "fan" + std::to_string(index);
             add(fan + "_input", "900");
             add(fan + "_min", "300");
@@ -84,6 +107,17 @@ private:
         return chip;
     }
 
+    std::string addressOf(int number) const
+    {
+        if (design_.bus != std::string("pci"))
+            return "bench." + std::to_string(number);
+        std::array<char, 32> address{};
+        std::snprintf(address.data(), address.size(), "0000:%02x:%02x.0", unsigned(number) / 32,
+            unsigned(number) % 32);
+        return address.data();
+    }
+
+    const Design design_;
     Testing::TemporaryFolder folder_;
     std::vector<Chip> chips_;
 };

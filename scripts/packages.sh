@@ -27,7 +27,7 @@ check_packages=(
 bench_packages=(
   "${build_packages[@]}"
   libbenchmark-dev
-  iproute2 lm-sensors util-linux
+  iproute2 lm-sensors prometheus-cpp-dev util-linux
 )
 
 # Packages whose programs are needed, but not the services that their installation starts.
