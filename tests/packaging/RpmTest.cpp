@@ -293,9 +293,8 @@ TEST_F(RpmRootTest, ServiceHasAUserAndIsNotStarted)
     EXPECT_THAT(contentOf(root_.path() / "etc/passwd"),
         ContainsRegex("sensor-profile:[^\n]*:Sensor profile service:[^\n]*/nologin\n"));
     EXPECT_FALSE(isEnabled());
-    EXPECT_THAT(calls(),
-        ElementsAre("--no-reload preset sensor-profile.service", "daemon-reload",
-            "udevadm control --reload", "udevadm trigger --subsystem-match=ipmi"));
+    EXPECT_THAT(calls(), ElementsAre("--no-reload preset sensor-profile.service", "daemon-reload",
+                             "udevadm control --reload", "udevadm trigger --subsystem-match=ipmi"));
 }
 
 TEST_F(RpmRootTest, ServiceIsEnabledWhereTheDistributionPresetsIt)
@@ -325,10 +324,9 @@ TEST_F(RpmRootTest, UpgradeKeepsSettingsAndRestartsTheService)
     rpm("-U " + higher.files());
     EXPECT_EQ(contentOf(root_.path() / settings), changed);
     EXPECT_TRUE(isEnabled());
-    EXPECT_THAT(calls(),
-        ElementsAre("daemon-reload", "udevadm control --reload",
-            "udevadm trigger --subsystem-match=ipmi", "daemon-reload",
-            "try-restart sensor-profile.service sensor-profile-collect.service"));
+    EXPECT_THAT(calls(), ElementsAre("daemon-reload", "udevadm control --reload",
+                             "udevadm trigger --subsystem-match=ipmi", "daemon-reload",
+                             "try-restart sensor-profile.service sensor-profile-collect.service"));
     EXPECT_EQ(
         rpm("-q " + tool), tool + "-" SENSOR_PROFILE_VERSION "-2." SENSOR_PROFILE_PROCESSOR "\n");
 }
@@ -341,10 +339,10 @@ TEST_F(RpmRootTest, RemovalLeavesChangedSettingsOnly)
     const Ended ended = tryRpm("-e " + provider + " " + tool);
     EXPECT_EQ(ended.code, 0);
     EXPECT_THAT(ended.err, HasSubstr("saved as /" + settings + ".rpmsave"));
-    EXPECT_THAT(calls(),
-        ElementsAre("--no-reload disable --now sensor-profile.service",
-            "stop sensor-profile-collect.service",
-            "clean --what=runtime sensor-profile-collect.service", "daemon-reload"));
+    EXPECT_THAT(
+        calls(), ElementsAre("--no-reload disable --now sensor-profile.service",
+                     "stop sensor-profile-collect.service",
+                     "clean --what=runtime sensor-profile-collect.service", "daemon-reload"));
     EXPECT_THAT(newEntries(), ElementsAre("etc/sensor-profile", settings + ".rpmsave"));
 }
 
