@@ -106,6 +106,20 @@ TEST_F(CollectSurroundingsTest, EverybodyCanReadTheFile)
     EXPECT_THAT(ended.out, testing::ContainsRegex("CPU1 Temp .* 58 "));
 }
 
+TEST_F(CollectSurroundingsTest, ACheckThatMayNotReadTheFileIsUnknown)
+{
+    if (::geteuid() != 0)
+        return cannotRun("only root can run a command as nobody");
+    collect();
+    ::chmod(folder_.path().c_str(), 0755);
+    ::chmod(file().c_str(), 0600);
+    const Ended ended =
+        runCommand(joined(asNobody, {"check"}), {{"VORN_INSTRUMENTATION", "ipmi:" + file()}});
+    EXPECT_EQ(ended.code, 3);
+    EXPECT_THAT(ended.out,
+        testing::StartsWith("SENSORS UNKNOWN - model file " + file() + ": Permission denied"));
+}
+
 TEST_F(CollectSurroundingsTest, NobodyIsToldWhatIsNotPermitted)
 {
     if (::geteuid() != 0)
