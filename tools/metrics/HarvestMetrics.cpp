@@ -39,10 +39,10 @@ void addHarvest(Exposition& exposition, const Harvest& harvest)
     exposition.add(Labels().add("version", SENSOR_PROFILE_VERSION), 1);
 }
 
-void addResponses(Exposition& exposition, const Host::Http::ResponseCounts& counts)
+void addResponses(Exposition& exposition, const Host::Http::ResponseCounts& answered)
 {
     exposition.begin(responses);
-    for (const auto& [status, count] : counts.get())
+    for (const auto& [status, count] : answered.get())
         exposition.add(Labels().add("code", std::to_string(status)), static_cast<double>(count));
 }
 
