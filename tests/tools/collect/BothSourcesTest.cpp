@@ -23,6 +23,14 @@ using testing::ContainsRegex;
 using Testing::Ended;
 using testing::HasSubstr;
 
+struct Machine {
+    Testing::BoundSysfs sysfs{"server"};
+    Testing::BoundSensorsConfiguration configuration{""};
+    Testing::TemporaryFolder run;
+    Testing::BindMount mount{run.path(), "/run"};
+    Testing::SimulatedBmc controller{Testing::emulationOf(Testing::simulatedServer())};
+};
+
 class BothSourcesTest : public Testing::MountNamespaceTest {
 protected:
     void SetUp() override
@@ -51,13 +59,6 @@ protected:
         return found;
     }
 
-    struct Machine {
-        Testing::BoundSysfs sysfs{"server"};
-        Testing::BoundSensorsConfiguration configuration{""};
-        Testing::TemporaryFolder run;
-        Testing::BindMount mount{run.path(), "/run"};
-        Testing::SimulatedBmc controller{Testing::emulationOf(Testing::simulatedServer())};
-    };
     std::optional<Machine> machine_;
 };
 
