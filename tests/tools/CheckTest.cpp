@@ -214,7 +214,8 @@ TEST_F(CheckTest, ProblemsLeaveOutWhatIsOk)
     EXPECT_EQ(
         checked({"cpu1", "--problems", "--warning", "cpu1=99", "--critical", "cpu1=100"}).code, 0);
     EXPECT_EQ(checked({"nothing", "--problems"}).out,
-        "SENSORS UNKNOWN - no sensor matches \"nothing\"\n");
+        "SENSORS UNKNOWN - no sensor matches \"nothing\", there are the chips \"board\", \"cpu0\", "
+        "\"cpu1\"\n");
 }
 
 TEST_F(CheckTest, ManyProblemsAreCounted)
@@ -235,9 +236,9 @@ TEST_F(CheckTest, ManyProblemsAreCounted)
 TEST_F(CheckTest, WhatCannotBeJudgedIsUnknown)
 {
     const std::vector<std::pair<std::vector<std::string>, std::string>> cases = {
-        {{"--model", smallModel(), "nothing"}, "no sensor matches \"nothing\"\n"},
+        {{"--model", smallModel(), "nothing"}, "no sensor matches \"nothing\", there are"},
         {{"--model", smallModel(), "cpu0", "--warning", "x=1"},
-            "no sensor matches \"x\" - 1 sensor"},
+            "no sensor matches \"x\", there are the chips"},
         {{"--model", smallModel(), "--warning", "cpu0"}, "\"cpu0\" is not SELECTOR=RANGE ("},
         {{"--model", smallModel(), "--critical", "cpu0=hot"}, "\"hot\" is no range such as 10:80"},
         {{"--model", smallModel(), "--critical", "cpu0=5:4"}, "\"5:4\" begins above its end"},

@@ -178,7 +178,8 @@ TEST_F(GetTest, WhatNothingMatchesHasTheNearestNames)
     EXPECT_EQ(ended.err, "sensorctl: no sensor matches \"CPU 3\"; what comes nearest: \"CPU 1\", "
                          "\"CPU 2\"\n");
     for (const std::string wanted : {"xyz", "", "list"})
-        EXPECT_EQ(got(wanted).err, "sensorctl: no sensor matches \"" + wanted + "\"\n");
+        EXPECT_EQ(got(wanted).err, "sensorctl: no sensor matches \"" + wanted +
+                                       "\"; there are the chips \"board\", \"cpu0\", \"cpu1\"\n");
     EXPECT_EQ(got("ZUMLO_NumericSensor.DeviceID=\"none\"").err,
         "sensorctl: there is no object with the path \"ZUMLO_NumericSensor.DeviceID=\"none\"\"\n");
 }

@@ -236,12 +236,13 @@ TEST_F(ConfigurationMistakesTest, AreToldOnceInTheWordsOfSensors)
     const std::string expected = standardErrorOf("/usr/bin/sensors");
     EXPECT_NE(expected.find("Error: File /etc/sensors3.conf, line 2: "), std::string::npos)
         << expected;
-    for (const char* const command : {"list", "walk", "record"}) {
+    for (const std::vector<std::string>& words : {std::vector<std::string>{"list"}, {"get", "fan2"},
+             {"walk"}, {"check", "fan2"}, {"metrics"}, {"record"}}) {
         // The parser of libsensors does not free the words of a line with an error.
-        const Ended ended = run(
-            {command}, {.environment = {{"RYNLOG_LOG", ""}, {"ASAN_OPTIONS", "detect_leaks=0"}}});
-        EXPECT_EQ(ended.code, 0);
-        EXPECT_EQ(ended.err, expected) << command;
+        const Ended ended =
+            run(words, {.environment = {{"RYNLOG_LOG", ""}, {"ASAN_OPTIONS", "detect_leaks=0"}}});
+        EXPECT_EQ(ended.code, 0) << words.front();
+        EXPECT_EQ(ended.err, expected) << words.front();
     }
 }
 

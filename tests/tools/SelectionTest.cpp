@@ -49,7 +49,8 @@ TEST_F(SelectionTest, LettersOfAllScriptsAreSelectedInAnyCase)
     const auto found = [&](const std::string& selector) {
         return nlohmann::json::parse(run({"list", "--json", "--model", file, selector}).out).size();
     };
-    for (const char* const selector : {"lüfter", "LÜFTER", "*üf*", "ВЕНТИЛЯТОР", "Вент*", "STRAßE"})
+    for (const char* const selector :
+        {"lüfter", "LÜFTER", "*üf*", "l?fter", "L[Üö]FTER", "ВЕНТИЛЯТОР", "Вент*", "STRAßE"})
         EXPECT_EQ(found(selector), 1U) << selector;
     EXPECT_EQ(found("GEHÄUSE"), 2U);
     EXPECT_EQ(found("luefter"), 0U);
@@ -122,10 +123,19 @@ TEST_F(SelectionTest, EachSelectorThatNothingMatchesIsSaid)
 TEST_F(SelectionTest, NamesAreNearestUpToAThirdOfTheSelector)
 {
     for (const char* const selector : {"xp", "xyz0", "CPU 1234"})
-        EXPECT_EQ(listed({selector}).err,
-            std::string("sensorctl: no sensor matches \"") + selector + "\"\n");
+        EXPECT_EQ(
+            listed({selector}).err, std::string("sensorctl: no sensor matches \"") + selector +
+                                        "\"; there are the chips \"board\", \"cpu0\", \"cpu1\"\n");
     for (const char* const selector : {"cp", "cup0", "xpu0", "baord", "xyu1/t", "CPU 12"})
         EXPECT_THAT(listed({selector}).err, HasSubstr("; what comes nearest: ")) << selector;
+}
+
+TEST_F(SelectionTest, FurtherChipsAreCountedWhereNoNameIsNear)
+{
+    EXPECT_EQ(
+        run({"list", "quux", "--model", SENSOR_PROFILE_SOURCE_DIR "/schema/demo-model.json"}).err,
+        "sensorctl: no sensor matches \"quux\"; there are the chips \"system\", \"system/board\", "
+        "\"system/chassis\" and 7 more\n");
 }
 
 TEST_F(SelectionTest, NothingLeftIsSaidAndEndsWithThree)

@@ -5,6 +5,8 @@
 #include "host/broker/Names.h"
 #include "platform/text/Utf8.h"
 
+#include <fnmatch.h>
+
 #include <clocale>
 #include <cwctype>
 #include <memory>
@@ -16,12 +18,18 @@ namespace {
 
 constexpr char32_t endOfAscii = 0x80;
 
-char32_t smallForeignLetter(char32_t character)
+// Returns null where there is no such locale.
+locale_t utf8Locale()
 {
     using Locale = std::unique_ptr<std::remove_pointer_t<locale_t>, decltype(&::freelocale)>;
     static const Locale locale(::newlocale(LC_CTYPE_MASK, "C.UTF-8", nullptr), &::freelocale);
-    return locale == nullptr ? character
-                             : static_cast<char32_t>(::towlower_l(character, locale.get()));
+    return locale.get();
+}
+
+char32_t smallForeignLetter(char32_t character)
+{
+    const locale_t locale = utf8Locale();
+    return locale == nullptr ? character : static_cast<char32_t>(::towlower_l(character, locale));
 }
 
 } // namespace
@@ -43,6 +51,14 @@ std::string withSmallLetters(std::string_view text)
         text.remove_prefix(character.size);
     }
     return small;
+}
+
+bool matchesPattern(const std::string& pattern, const std::string& text)
+{
+    const locale_t former = ::uselocale(utf8Locale()); // of this thread; null changes nothing
+    const bool isMatch = ::fnmatch(pattern.c_str(), text.c_str(), FNM_NOESCAPE) == 0;
+    ::uselocale(former);
+    return isMatch;
 }
 
 } // namespace Tools

@@ -1,7 +1,7 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Letters without regard to their case, as the C library's UTF-8 locale pairs them, whatever the
-// locale of the process is. Without that locale, only ASCII letters are paired.
+// Letters and patterns by the C library's UTF-8 locale, whatever the locale of the process is.
+// Without that locale, only ASCII letters have a case.
 
 #pragma once
 
@@ -16,5 +16,8 @@ char32_t smallLetter(char32_t character);
 // Returns the text with small letters in place of capital ones, and U+FFFD in place of invalid
 // bytes.
 std::string withSmallLetters(std::string_view text);
+
+// Returns whether the text matches the pattern of fnmatch(3), in which ? stands for a character.
+bool matchesPattern(const std::string& pattern, const std::string& text);
 
 } // namespace Tools

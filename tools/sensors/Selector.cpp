@@ -4,8 +4,6 @@
 
 #include "tools/sensors/LetterCase.h"
 
-#include <fnmatch.h>
-
 #include <algorithm>
 #include <array>
 #include <set>
@@ -66,8 +64,20 @@ std::string withPlainAddress(const std::string& chip)
 bool isMatch(const std::string& selector, const std::string& name)
 {
     const std::string small = withSmallLetters(name);
-    return small == selector ||
-           (isPattern(selector) && ::fnmatch(selector.c_str(), small.c_str(), FNM_NOESCAPE) == 0);
+    return small == selector || (isPattern(selector) && matchesPattern(selector, small));
+}
+
+// Returns the first chips, and how many others there are; an empty text when there are none.
+std::string chipsOf(const Sensors& sensors)
+{
+    std::set<std::string> chips;
+    std::string text;
+    for (const Sensor& sensor : sensors)
+        if (chips.insert(sensor.chip).second && chips.size() <= suggestions)
+            text.append(text.empty() ? "\"" : ", \"").append(sensor.chip).append("\"");
+    if (chips.size() > suggestions)
+        text.append(" and ").append(std::to_string(chips.size() - suggestions)).append(" more");
+    return text;
 }
 
 } // namespace
@@ -106,6 +116,8 @@ std::string nothingMatches(const std::string& selector, const Sensors& sensors)
                 nearest.erase(std::prev(nearest.end()));
         }
     std::string text = "no sensor matches \"" + selector + "\"";
+    if (nearest.empty() && !sensors.empty())
+        text += "; there are the chips " + chipsOf(sensors);
     const char* separator = "; what comes nearest: ";
     for (const auto& [distance, size, name] : nearest) {
         text.append(separator).append("\"").append(name).append("\"");

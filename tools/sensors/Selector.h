@@ -28,7 +28,8 @@ struct SensorFilter {
     bool accepts(const Sensor& sensor) const;
 };
 
-// Returns a sentence that no sensor matches the selector, with up to three names that are nearest.
+// Returns a sentence that no sensor matches the selector, with up to three names that are nearest;
+// where none is near, with up to three chips.
 std::string nothingMatches(const std::string& selector, const Sensors& sensors);
 
 } // namespace Tools
