@@ -5,6 +5,7 @@
 #pragma once
 
 #include <compare>
+#include <cstddef>
 #include <string>
 #include <string_view>
 
@@ -40,7 +41,11 @@ struct MetricFamily {
 
 class Exposition {
 public:
-    explicit Exposition(ExpositionForm form) : form_(form) {}
+    // `expectedSize` saves reallocations; a text may exceed it.
+    explicit Exposition(ExpositionForm form, std::size_t expectedSize = 0) : form_(form)
+    {
+        text_.reserve(expectedSize);
+    }
 
     // Begins a family. REQUIRES: the exposition has no other one of the name.
     void begin(const MetricFamily& family);

@@ -60,7 +60,7 @@ std::shared_ptr<const MetricsResource::Text> MetricsResource::write(ExpositionFo
 {
     if (!unsent_.hasRoomFor(latestSize_)) // before the sensors are read in vain
         throw tooMuchText();
-    Exposition exposition(form);
+    Exposition exposition(form, latestSize_ + latestSize_ / 64);
     auto harvest = harvests_.get();
     const std::size_t sensors = harvest->sensors.size();
     addHarvest(exposition, *harvest);

@@ -58,6 +58,16 @@ std::optional<std::string> suffixFor(const std::string& device)
     return std::nullopt;
 }
 
+// Returns the names and the identities of the chips' folders; none when they cannot be listed.
+auto presentChips()
+{
+    try {
+        return Vorn::Hwmon::presentMachine().chips;
+    } catch (const std::system_error&) {
+        return decltype(Vorn::Hwmon::Machine::chips)();
+    }
+}
+
 } // namespace
 
 ChipDevices::Chip ChipDevices::chipIn(const std::string& folder)
@@ -68,12 +78,13 @@ ChipDevices::Chip ChipDevices::chipIn(const std::string& folder)
     if (failure)
         return chip;
     chip.suffix = "-acpi-0";
-    chip.addressed = real;
+    chip.folders = {real};
     // A class device, such as that of a controller, may stand between the chip and its address.
     for (Files::path place = real; place.has_relative_path(); place = place.parent_path())
         if (const auto suffix = suffixFor(place.filename().string())) {
             chip.suffix = *suffix;
-            chip.addressed = place;
+            if (place != real)
+                chip.folders.push_back(place);
             break;
         }
     chip.model = lineIn(folder + "/device/model");
@@ -83,14 +94,14 @@ ChipDevices::Chip ChipDevices::chipIn(const std::string& folder)
 }
 
 // Looks for network interfaces each time, as udev renames them while their chip stays.
-std::string ChipDevices::deviceOf(const Chip& chip, const std::string& folder) const
+std::string ChipDevices::deviceOf(const Chip& chip) const
 {
     if (!chip.model.empty())
         return chip.model;
-    for (const std::string& place : {folder + "/device", chip.addressed})
-        if (const auto interfaces = entriesOf(place + "/net"); !interfaces.empty())
+    for (const std::string& folder : chip.folders)
+        if (const auto interfaces = entriesOf(folder + "/net"); !interfaces.empty())
             return *std::min_element(interfaces.begin(), interfaces.end());
-    const std::string address = Files::path(chip.addressed).filename();
+    const std::string address = Files::path(chip.folders.back()).filename();
     const auto slot = slotAt_.find(address.substr(0, address.rfind('.')));
     return slot == slotAt_.end() ? "" : "PCI slot " + slot->second;
 }
@@ -121,23 +132,20 @@ void ChipDevices::nameIn(Sensors& sensors)
     renewSlots();
     std::map<std::string, Known> present;
     std::map<std::string, std::string> devices; // by the name of the chip
-    for (const std::string& entry : entriesOf(hwmonFolder)) {
+    for (const auto& [entry, id] : presentChips()) {
         const std::string folder = std::string(hwmonFolder).append("/").append(entry);
-        const auto id = Vorn::Hwmon::folderId(folder);
-        if (!id)
-            continue;
         const auto before = known_.find(entry);
         Known& known = present[entry];
-        if (before != known_.end() && before->second.id == *id)
+        if (before != known_.end() && before->second.id == id)
             known = std::move(before->second);
         else
-            known = {*id, lineIn(folder + "/name"), std::nullopt};
+            known = {id, lineIn(folder + "/name"), std::nullopt};
         if (!named.contains(known.name))
             continue;
         if (!known.chip)
             known.chip = chipIn(folder);
-        if (!known.chip->suffix.empty())
-            devices.emplace(known.name + known.chip->suffix, deviceOf(*known.chip, folder));
+        if (!known.chip->folders.empty())
+            devices.emplace(known.name + known.chip->suffix, deviceOf(*known.chip));
     }
     for (Sensor& sensor : sensors)
         if (const auto device = devices.find(sensor.chip); device != devices.end())

@@ -24,9 +24,9 @@ public:
 
 private:
     struct Chip {
-        std::string suffix;    // that libsensors appends to its name; empty without a device
-        std::string addressed; // the folder of the device with the address
-        std::string model;     // of the device
+        std::string suffix;               // that libsensors appends to its name
+        std::vector<std::string> folders; // of its device, and of the one with the address
+        std::string model;                // of its device
     };
     struct Known {
         Vorn::Hwmon::FolderId id;
@@ -35,7 +35,7 @@ private:
     };
 
     static Chip chipIn(const std::string& folder);
-    std::string deviceOf(const Chip& chip, const std::string& folder) const;
+    std::string deviceOf(const Chip& chip) const;
     void renewSlots();
 
     std::map<std::string, Known> known_; // by the name of the folder

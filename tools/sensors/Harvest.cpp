@@ -6,10 +6,11 @@
 #include "host/broker/Request.h"
 #include "host/manager/Manager.h"
 #include "platform/instrumentation/OpenSource.h"
-#include "platform/instrumentation/hwmon/Machine.h"
+#include "platform/instrumentation/hwmon/ChipList.h"
 #include "tools/SourceOptions.h"
 #include "tools/cim/ProviderClient.h"
 
+#include <algorithm>
 #include <exception>
 #include <map>
 #include <string_view>
@@ -48,15 +49,23 @@ using Identifiers = std::unordered_set<std::string_view>;
 // returns no error where a source cannot be read or breaks off.
 bool isUp(const Vorn::SourceEntry& entry, const Identifiers& harvested)
 {
+    const auto isHarvested = [&](const Vorn::Node& node) {
+        return harvested.contains(deviceIdOf(node.description, node.path));
+    };
     try {
         if (entry.scheme == "hwmon" && !isLibsensorsPrivate) {
             Vorn::Hwmon::presentMachine(); // throws where the chips cannot be listed
             return true;
         }
+        if (entry.scheme == "hwmon") { // the list of all types at once
+            const auto catalogue = Vorn::Hwmon::ChipList::instance().present();
+            return std::all_of(catalogue->features.begin(), catalogue->features.end(),
+                [&](const auto& feature) { return isHarvested(feature.node); });
+        }
         const auto source = Vorn::openSource(entry);
         for (const NodeType type : {NodeType::Temperature, NodeType::Voltage, NodeType::Tachometer})
             for (const Vorn::Node& node : source->nodes(type))
-                if (!harvested.contains(deviceIdOf(node.description, node.path)))
+                if (!isHarvested(node))
                     return false;
         return true;
     } catch (const std::exception&) {
