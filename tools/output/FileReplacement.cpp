@@ -13,6 +13,7 @@
 #include <filesystem>
 #include <stdexcept>
 #include <system_error>
+#include <utility>
 
 namespace Tools {
 
@@ -57,8 +58,8 @@ public:
     {
     }
     // Replaces a file of that name, too.
-    Replacement(const std::string& target, const std::string& name)
-        : target_(target), name_(name), file_(openNew(name))
+    Replacement(std::string target, std::string name)
+        : target_(std::move(target)), name_(std::move(name)), file_(openNew(name_))
     {
     }
     ~Replacement()
