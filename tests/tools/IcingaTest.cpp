@@ -60,11 +60,13 @@ TEST_F(IcingaTest, ExampleOfTheManualIsValid)
 TEST_F(IcingaTest, UnderstandsStatusAndPerformanceData)
 {
     // An agent needs certificates, so that the host is checked without one.
-    const std::string objects = replaced(example(), "command_endpoint = host.name\n", "");
+    const std::string objects = replaced(example(), "command_endpoint = host.name\n",
+        "vars.sensors_problems = true\n  vars.sensors_selectors = [ \"cpu1\", \"+12V\" ]\n");
     const Ended ended = icinga(objects, "",
         " >log & while kill -0 $! && ((SECONDS < 30)); do sleep 0.1; "
         "grep --no-filename . service.[0-9]* && break; done || cat log; kill -KILL -- -$!");
     EXPECT_THAT(ended.out, StartsWith("CRITICAL SENSORS CRITICAL - cpu1/CPU 2: Critical high"));
+    EXPECT_THAT(ended.out, HasSubstr(" - 2 sensors: 1 warning, 1 critical."));
     EXPECT_THAT(ended.out, HasSubstr(" | board/+12V=12.75V;"));
 }
 
