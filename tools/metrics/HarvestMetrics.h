@@ -15,7 +15,7 @@ namespace Tools {
 void addHarvest(Exposition& exposition, const Harvest& harvest);
 
 // Adds the numbers of HTTP responses.
-void addResponses(Exposition& exposition, const Host::Http::ResponseCounts& counts);
+void addResponses(Exposition& exposition, const Host::Http::ResponseCounts& answered);
 
 // Adds the number of objects in the memory of open enumerations.
 void addHeldObjects(Exposition& exposition, std::size_t objects);
