@@ -54,10 +54,10 @@ void expectSame(const std::map<Labeled, double>& ours, const std::map<Labeled, d
         EXPECT_TRUE(theirs.contains(series)) << "too many: " << textOf(series);
 }
 
-std::string scrape(const ServerProcess& server)
+std::string scrape(const ServerProcess& server, const std::string& fields = "")
 {
     HttpClient client(server.port());
-    client.send("GET /metrics HTTP/1.1\r\nHost: localhost\r\n\r\n");
+    client.send("GET /metrics HTTP/1.1\r\nHost: localhost\r\n" + fields + "\r\n");
     return client.receive().body;
 }
 
@@ -140,12 +140,25 @@ TEST_F(HwmonMetricsTest, NodeExporterHasTheSameSeriesOfEveryAttribute)
                  "auto_channels_temp", "auto_point1_pwm", "auto_point1_temp", "unheard_of"})
             if (sensor != "pwm1" || element != "input") // pwm1 is an attribute itself
                 add("hwmon0/" + sensor + "_" + element, std::to_string(++value));
-    for (const std::string attribute :
-        {"pwm1", "vrm", "update_interval", "beep_enable", "alarms", "uevent", "in_reset",
-            "temp1_a-b", "temp1_A", "temp1_x.y", "temp1_é", "temp1-b", "TEMP1_input", "temp1_ALARM",
-            "fan1_Input", "fan1_MIN", "power1_Accuracy", "temp3_Label", "temp5_input_"})
+    for (const std::string attribute : {"pwm1", "vrm", "update_interval", "beep_enable", "alarms",
+             "uevent", "in_reset", "temp1_odd-name", "temp1_A", "temp1_x.y", "temp1_é", "temp1-b",
+             "TEMP1_input", "temp1_ALARM", "fan1_Input", "fan1_MIN", "power1_Accuracy",
+             "temp3_Label", "temp5_input_"})
         add("hwmon0/" + attribute, "1");
-    expectSame(hwmonSeriesIn(compatible()), hwmonSeriesIn(NodeExporter().metrics()));
+    const std::string text = compatible();
+    expectSame(hwmonSeriesIn(text), hwmonSeriesIn(NodeExporter().metrics()));
+
+    const TemporaryFolder folder;
+    const Ended promtool = run(
+        {"-c", "promtool check metrics <" + folder.write("text", text)}, {.program = "/bin/sh"});
+    EXPECT_EQ(promtool.out + promtool.err, "");
+    const ServerProcess server({"--compatible", "node_exporter"});
+    scrape(server); // the first response that is counted
+    const Ended parser =
+        run({"-c", openMetricsParser, folder.write("open", scrape(server, acceptOfPrometheus))},
+            {.program = "/usr/bin/python3"});
+    EXPECT_EQ(parser.err, "");
+    EXPECT_EQ(parser.out, std::to_string(seriesIn(scrape(server)).size()) + "\n");
 }
 
 TEST_F(HwmonMetricsTest, NodeExporterHasTheSameSeriesOfOddChips)

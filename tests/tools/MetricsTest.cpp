@@ -226,10 +226,6 @@ std::string get(const std::string& fields = "", const std::string& method = "GET
     return method + " /metrics HTTP/1.1\r\nHost: localhost\r\n" + fields + "\r\n";
 }
 
-const std::string acceptOfPrometheus =
-    "Accept: application/openmetrics-text;version=1.0.0,application/openmetrics-text;version=0.0.1;"
-    "q=0.75,text/plain;version=0.0.4;q=0.5,*/*;q=0.1\r\n";
-
 TEST_F(MetricsTest, ServerGivesThoseOfTheCommandAndItsOwn)
 {
     const ServerProcess server(withModel());
@@ -284,13 +280,8 @@ TEST_F(MetricsTest, OpenMetricsIsGivenToThoseWhoPreferIt)
 
     // The parser of the Python client is strict.
     const HttpReply reply = ask(HttpClient(server.port()), get(acceptOfPrometheus));
-    const std::string program =
-        "import sys\n"
-        "from prometheus_client.openmetrics.parser import text_string_to_metric_families\n"
-        "families = text_string_to_metric_families(open(sys.argv[1], encoding='utf-8').read())\n"
-        "print(sum(len(family.samples) for family in families))\n";
-    const Ended ended =
-        run({"-c", program, folder_.write("open", reply.body)}, {.program = "/usr/bin/python3"});
+    const Ended ended = run({"-c", openMetricsParser, folder_.write("open", reply.body)},
+        {.program = "/usr/bin/python3"});
     EXPECT_EQ(ended.err, "");
     const HttpReply text = ask(HttpClient(server.port()), get());
     EXPECT_EQ(ended.out, std::to_string(seriesIn(text.body).size()) + "\n");

@@ -13,6 +13,17 @@
 
 namespace Testing {
 
+inline const std::string acceptOfPrometheus =
+    "Accept: application/openmetrics-text;version=1.0.0,application/openmetrics-text;version=0.0.1;"
+    "q=0.75,text/plain;version=0.0.4;q=0.5,*/*;q=0.1\r\n";
+
+// A Python program that prints how many series the file of its argument has, as OpenMetrics.
+inline const std::string openMetricsParser =
+    "import sys\n"
+    "from prometheus_client.openmetrics.parser import text_string_to_metric_families\n"
+    "families = text_string_to_metric_families(open(sys.argv[1], encoding='utf-8').read())\n"
+    "print(sum(len(family.samples) for family in families))\n";
+
 struct Series {
     std::string name;
     std::map<std::string, std::string> labels;
