@@ -32,7 +32,7 @@ Tools::Harvest machineOf(std::int64_t sensors)
         sensor.setNames("Sensor " + number, "/hwmon/bench-isa-0290/temp" + number);
         sensor.kind = Tools::sensorKinds.at(static_cast<std::size_t>(i) % 3);
         sensor.reading = Tools::Quantity{41'000 + i, -3};
-        for (const std::size_t limit : {0, 1, 3, 4})
+        for (const std::size_t limit : {0U, 1U, 3U, 4U})
             sensor.limits.at(limit) = Tools::Quantity{95'125, -3};
         sensor.possibleStates = {"Normal", "Warning", "Critical"};
         sensor.state = {"Normal", Tools::Urgency::normal};
