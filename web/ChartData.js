@@ -1,0 +1,58 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// The history of the sensors in the chart.
+
+/**
+ * Returns the answer of `/api/history` for these devices; null where there is no history of them.
+ * Throws where there is no connection.
+ */
+export async function loadHistory(devices, span) {
+    const query = new URLSearchParams({ span });
+    for (const device of devices)
+        query.append('device', device);
+    const response = await fetch(`/api/history?${query}`);
+    return response.ok ? response.json() : null;
+}
+
+/** Returns the beginning of each sample of a sensor in milliseconds, and their end. */
+export function timesOf({ end, interval }, count) {
+    return Array.from({ length: count + 1 }, (_, i) => 1000 * (end - (count - i) * interval));
+}
+
+/**
+ * Returns rows for dygraphs: a time, and for each sensor its reading or, of a day, an array with
+ * minimum, mean and maximum.
+ */
+export function rowsOf(history) {
+    const { span, sensors } = history;
+    const series = sensors.map(({ values, minimum, mean, maximum }) => span === 'hour' ? values
+        : mean.map((value, i) => value === null ? [null, null, null]
+            : [minimum[i], value, maximum[i]]));
+    const count = Math.max(...series.map((values) => values.length));
+    return timesOf(history, count).slice(0, -1).map((time, row) => [new Date(time),
+        ...series.map((values) => values[row - (count - values.length)] ??
+            (span === 'hour' ? null : [null, null, null]))]);
+}
+
+/** Returns the least, the mean and the greatest reading of a sensor's history; null for none. */
+export function extremesOf({ values, minimum, mean, maximum }) {
+    const present = (list) => list.filter((value) => value !== null);
+    const means = present(values ?? mean);
+    if (means.length === 0)
+        return null;
+    return {
+        least: Math.min(...present(values ?? minimum)),
+        mean: means.reduce((sum, value) => sum + value, 0) / means.length,
+        greatest: Math.max(...present(values ?? maximum)),
+    };
+}
+
+/** Returns the times at which each state began and ended, in milliseconds, the oldest first. */
+export function stateRunsOf({ states }, { end, interval }) {
+    let begin = end - interval * states.reduce((sum, [, count]) => sum + count, 0);
+    return states.map(([state, count]) => {
+        const run = { state, begin: 1000 * begin, end: 1000 * (begin + count * interval) };
+        begin += count * interval;
+        return run;
+    });
+}

@@ -1,0 +1,112 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// The panel with the chart and its buttons. What it shows is in the address.
+
+import { Chart, mostSensors } from './Chart.js';
+import { loadHistory } from './ChartData.js';
+import { ChartLegend } from './ChartLegend.js';
+import { fillStateChanges, summaryText } from './ChartWords.js';
+import { compareSensors } from './Machine.js';
+import { nameOf } from './SensorRow.js';
+import { isolated, text } from './Texts.js';
+
+const zooms = { in: [0.25, 0.75], out: [-0.5, 1.5], earlier: [-0.5, 0.5], later: [0.5, 1.5] };
+const refreshAfter = { hour: 10_000, day: 60_000 };
+
+export class ChartPanel {
+    devices = []; // that are shown
+    #timer = 0;
+
+    /** Calls `onChange` when the user changed the address by the panel. */
+    constructor(machine, address, onChange) {
+        this.machine = machine;
+        this.address = address;
+        this.onChange = onChange;
+        this.panel = document.getElementById('chart');
+        this.title = document.getElementById('chart-title');
+        this.comparison = document.getElementById('compare');
+        this.legend = new ChartLegend((device) =>
+            this.#set(this.devices.filter((other) => other !== device)));
+        this.chart = new Chart(document.getElementById('plot'), (row) => this.legend.showRow(row));
+        this.panel.addEventListener('click', ({ target }) => this.#click(target));
+        this.panel.addEventListener('keydown', ({ key }) => {
+            if (key === 'Escape')
+                this.#set([]);
+        });
+        this.comparison.addEventListener('change', () =>
+            this.#set([...this.devices, this.comparison.value]));
+        matchMedia('(prefers-color-scheme: dark)').addEventListener('change', () => {
+            this.chart.forget();
+            this.show();
+        });
+    }
+
+    /** Shows the sensors in the address of which the machine has, or had, one. */
+    show() {
+        const { address, machine } = this;
+        this.devices = address.devices.filter((id) => machine.sensors.has(id)).slice(0, mostSensors);
+        this.panel.hidden = this.devices.length === 0;
+        clearTimeout(this.#timer);
+        if (this.panel.hidden)
+            return;
+        const sensors = this.#sensors();
+        this.title.firstElementChild.textContent = nameOf(sensors[0]);
+        for (const button of this.panel.querySelectorAll('[data-span]'))
+            button.setAttribute('aria-pressed', button.dataset.span === address.span);
+        this.legend.show(sensors);
+        this.#offerComparison(sensors[0]);
+        this.#draw();
+    }
+
+    focus() {
+        this.title.focus();
+    }
+
+    #sensors() {
+        return this.devices.map((device) => this.machine.sensors.get(device));
+    }
+
+    #set(devices, span = this.address.span) {
+        this.address.setChart(devices, span);
+        this.onChange();
+    }
+
+    #click(target) {
+        const { span, zoom } = target.dataset;
+        if (span)
+            this.#set(this.devices, span);
+        else if (zoom === 'all')
+            this.chart.showAll();
+        else if (zoom)
+            this.chart.zoom(...zooms[zoom]);
+        else if (target.id === 'chart-close')
+            this.#set([]);
+    }
+
+    /** Offers the other sensors of the same unit. */
+    #offerComparison({ unit }) {
+        const others = [...this.machine.sensors.values()].filter((other) =>
+            other.unit === unit && !this.devices.includes(other.deviceId)).sort(compareSensors);
+        this.comparison.disabled = others.length === 0 || this.devices.length === mostSensors;
+        this.comparison.replaceChildren(new Option(text('choose'), ''), ...others.map((other) =>
+            new Option(`${isolated(nameOf(other))} (${isolated(other.chip)})`, other.deviceId)));
+    }
+
+    /** Draws the history that the server has now, and again when there is more of it. */
+    async #draw() {
+        const { devices, address: { span } } = this;
+        const history = await loadHistory(devices, span).catch(() => undefined);
+        if (devices !== this.devices || span !== this.address.span)
+            return;
+        const sensors = this.#sensors();
+        this.panel.classList.toggle('empty', !history);
+        document.getElementById('plot-summary').textContent =
+            history ? summaryText(history, sensors) : text('noHistory');
+        if (history) {
+            await this.chart.show(history, sensors[0]);
+            this.legend.setHistory(history);
+            fillStateChanges(document.getElementById('state-changes'), history);
+        }
+        this.#timer = setTimeout(() => this.#draw(), refreshAfter[span]);
+    }
+}

@@ -1,0 +1,67 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// Makes the server's table live.
+
+import { Address } from './Address.js';
+import { Announcer } from './Announcer.js';
+import { ChartPanel } from './ChartPanel.js';
+import { EventStream } from './EventStream.js';
+import { HourHistory } from './HourHistory.js';
+import { Machine } from './Machine.js';
+import { Overview } from './Overview.js';
+import { Sparklines } from './Sparkline.js';
+import { loadTexts, text, timeText } from './Texts.js';
+
+const texts = loadTexts();
+const address = new Address();
+const machine = new Machine();
+const hourHistory = new HourHistory(machine);
+const sparklines = new Sparklines((deviceId) => hourHistory.valuesOf(deviceId));
+await texts;
+
+const panel = new ChartPanel(machine, address, () => showChart());
+const overview = new Overview(machine, sparklines, address, (deviceId) => {
+    address.setChart([deviceId], address.span);
+    showChart();
+    panel.focus();
+});
+
+function showChart() {
+    const [last] = panel.devices;
+    overview.markShown(address.devices);
+    panel.show();
+    if (address.devices.length === 0 && last)
+        overview.focus(last);
+}
+
+function showConnection(lostSince) {
+    const element = document.getElementById('connection');
+    const words = lostSince === null ? text('live')
+        : text('connectionLost', { time: timeText(lostSince / 1000) });
+    if (element.textContent !== words)
+        element.textContent = words;
+    document.body.classList.toggle('offline', lostSince !== null);
+}
+
+let isFirst = true;
+
+function receive(name, data) {
+    if (name === 'sensors')
+        machine.replace(data);
+    else
+        machine.apply(data);
+    if (!isFirst)
+        return;
+    isFirst = false;
+    overview.show();
+    overview.search();
+    showChart();
+    new Announcer(machine);
+    hourHistory.load().then(() => sparklines.drawVisible());
+}
+
+address.addEventListener('change', () => {
+    overview.search();
+    showChart();
+});
+new EventStream(receive, showConnection);

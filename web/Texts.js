@@ -1,0 +1,62 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+// Texts, numbers and times in the language of the page, which the server has chosen.
+
+const language = document.documentElement.lang;
+const region = navigator.languages.find((each) => each.startsWith(language)) ?? language;
+let dictionary = {};
+
+/** Loads the texts of the page's language. The other functions need them. */
+export async function loadTexts() {
+    const response = await fetch(`/web/languages/${language}.json`);
+    dictionary = await response.json();
+}
+
+/** Returns the text of that name, with the values in place of their names in braces. */
+export function text(name, values = {}) {
+    return dictionary[name].replace(/\{(\w+)\}/g, (place, value) => values[value] ?? place);
+}
+
+/** Returns the words for a state of `/api/sensors`, and for a member of its `limits`. */
+export const stateText = (state) => dictionary.states[state] ?? state;
+export const limitText = (limit) => dictionary.limitNames[limit];
+
+/** Isolates data within a text, so that its direction does not change that of the neighbours. */
+export const isolated = (data) => `\u2068${data}\u2069`;
+
+const decimals = { '°C': 1, 'V': 2, 'RPM': 0 };
+const formats = new Map();
+
+/** Returns a reading with as many decimals as people compare readings of its unit by. */
+export function readingText(value, unit) {
+    const digits = Math.abs(value) < 1 && unit === 'V' ? 3 : (decimals[unit] ?? 2);
+    if (!formats.has(digits))
+        formats.set(digits, new Intl.NumberFormat(region,
+            { minimumFractionDigits: digits, maximumFractionDigits: digits, useGrouping: 'min2' }));
+    return formats.get(digits).format(value);
+}
+
+const exact = new Intl.NumberFormat(region, { maximumFractionDigits: 6, useGrouping: 'min2' });
+
+/** Returns a number in full, with its unit where it has one. */
+export function quantityText(value, unit) {
+    return exact.format(value) + (unit ? `\u00a0${unit}` : '');
+}
+
+const timeOfDay = new Intl.DateTimeFormat(region, { timeStyle: 'short' });
+const dayAndTime = new Intl.DateTimeFormat(region, { dateStyle: 'short', timeStyle: 'short' });
+const exactTime = new Intl.DateTimeFormat(region, { timeStyle: 'medium' });
+
+/** Returns a time of Unix in the browser's zone: with the date unless it is of today. */
+export function timeText(seconds) {
+    const time = new Date(seconds * 1000);
+    const isToday = time.toDateString() === new Date().toDateString();
+    return (isToday ? timeOfDay : dayAndTime).format(time);
+}
+
+/** Returns a time of day with seconds. */
+export const exactTimeText = (seconds) => exactTime.format(seconds * 1000);
+
+/** Returns the label of a time axis that shows that many seconds. */
+export const axisTimeText = (seconds, span) =>
+    (span < 600 ? exactTime : timeOfDay).format(seconds * 1000);
