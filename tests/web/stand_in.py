@@ -9,6 +9,7 @@ import math
 import mimetypes
 import pathlib
 import re
+import select
 import socket
 import threading
 import time
@@ -56,12 +57,17 @@ def natural(text):
             for part in re.split(r"(\d+)", text.lower()) if part]
 
 
+PLACE = re.compile(r"\{\{#(\w+)\}\}(.*?)\{\{/\1\}\}|\{\{([\w.]+)\}\}", re.S)
+
+
 def render(template, places):
-    """Fills the template: lists repeat their sections, texts are escaped."""
-    def section(match):
-        return "".join(render(match[2], {**places, **item}) for item in places[match[1]])
-    template = re.sub(r"\{\{#(\w+)\}\}(.*?)\{\{/\1\}\}", section, template, flags=re.S)
-    return re.sub(r"\{\{([\w.]+)\}\}", lambda match: html.escape(str(places[match[1]])), template)
+    """Fills the template in one pass: lists repeat their sections, texts are escaped."""
+    def fill(match):
+        section, inner, place = match.groups()
+        if section is None:
+            return html.escape(str(places[place]))
+        return "".join(render(inner, {**places, **item}) for item in places[section])
+    return PLACE.sub(fill, template)
 
 
 class StandIn:
@@ -71,6 +77,8 @@ class StandIn:
         self.machine = machine
         self.past = past
         self.port = 0
+        self.event_streams = 0
+        self.keeps_history = True
         self.changed = threading.Condition()
         machine.on_change = self._notify
 
@@ -223,6 +231,8 @@ class Handler(http.server.BaseHTTPRequestHandler):
 
     def _history(self, query):
         span = query.get("span", [""])[0]
+        if not self.server_of.keeps_history:
+            return self._json({"error": "no history is kept"}, 404)
         if span not in INTERVALS:
             return self._json({"error": "span must be hour or day"}, 400)
         document = self.server_of.history(
@@ -232,16 +242,23 @@ class Handler(http.server.BaseHTTPRequestHandler):
         return self._json(document)
 
     def _events(self):
-        server = self.server_of
         self._head(200, "text/event-stream")
         self.close_connection = True
+        self.server_of.event_streams += 1
+        try:
+            self._send_events(self.server_of)
+        finally:
+            self.server_of.event_streams -= 1
+
+    def _send_events(self, server):
         known = server.sensors()
         self._event("sensors", known)
         alive = time.time()
         while server.is_running:
             with server.changed:
                 server.changed.wait(1)
-            time.sleep(0.2)
+            if select.select([self.connection], [], [], 0.2)[0]:
+                return  # the browser has closed the connection
             now = server.sensors()
             if now != known:
                 before = {sensor["deviceId"]: sensor for sensor in known}

@@ -1,0 +1,113 @@
+# Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+"""The chart: its spans, zoom and comparison."""
+
+from selenium.webdriver import ActionChains
+from selenium.webdriver.support.ui import Select
+
+from browser import PageTest
+from machine import Machine
+from served import wave
+
+CPU1 = "CPU 1 Package Temp:/system/cpu1/package"
+CPU2 = "CPU 2 Package Temp:/system/cpu2/package"
+LEGEND = "[...document.querySelectorAll('#compared bdi')].map(each => each.textContent)"
+AXIS = ("[...document.querySelectorAll('#plot .dygraph-axis-label-x')]"
+        ".map(each => each.textContent).filter(text => text)")
+
+
+class ChartTest(PageTest):
+    def setUp(self):
+        super().setUp()
+        self.server = self.serve(Machine.demonstration(), past=wave)
+
+    def open_chart(self, query):
+        self.open(self.server, query)
+        self.wait_for("document.querySelector('#plot canvas') && "
+                      "document.querySelector('#plot-summary').textContent")
+
+    def test_opens_by_a_click_and_closes_by_its_button(self):
+        self.open(self.server)
+        self.driver.find_element("css selector", ".chips .sensor .gauge").click()
+        self.wait_for("document.querySelector('#plot canvas')")
+        self.assertEqual(["System Fan 1"], self.run_script(LEGEND))
+        self.assertIn("device=System+Fan+1", self.driver.current_url)
+        self.assertEqual("true", self.run_script(
+            "document.querySelector('.chips .sensor button').ariaExpanded"))
+        self.driver.find_element("id", "chart-close").click()
+        self.assertTrue(self.run_script("document.querySelector('#chart').hidden"))
+        self.assertNotIn("device", self.driver.current_url)
+
+    def test_compares_sensors_of_one_unit(self):
+        self.open_chart("?device=" + CPU2)
+        select = Select(self.driver.find_element("id", "compare"))
+        self.assertEqual([], [option.text for option in select.options if "Fan" in option.text])
+        select.select_by_value(CPU1)
+        self.wait_for(f"{LEGEND}.length === 2")
+        self.wait_for("document.querySelector('#plot-summary').textContent.includes('CPU 1')")
+        self.driver.back()
+        self.wait_for(f"{LEGEND}.length === 1")
+        self.driver.forward()
+        self.wait_for(f"{LEGEND}.length === 2")
+        self.driver.find_element("css selector", "#compared li:first-child button").click()
+        self.assertEqual(["CPU 1 Package Temp"], self.run_script(LEGEND))
+
+    def test_zooms_by_the_pointer_and_back_by_the_button(self):
+        self.open_chart("?device=" + CPU2)
+        whole = self.run_script(AXIS)
+        plot = self.driver.find_element("id", "plot")
+        ActionChains(self.driver).move_to_element(plot).click_and_hold().move_by_offset(
+            150, 0).release().perform()
+        self.wait_for(f"{AXIS}.join() !== arguments[0]", 3, ",".join(whole))
+        self.driver.find_element("css selector", "[data-zoom=all]").click()
+        self.wait_for(f"{AXIS}.join() === arguments[0]", 3, ",".join(whole))
+
+    def test_shows_the_reading_at_the_pointer(self):
+        self.open_chart("?device=" + CPU2)
+        ActionChains(self.driver).move_to_element(
+            self.driver.find_element("id", "plot")).perform()
+        self.wait_for("/°C \\(.*:.*:/.test("
+                      "document.querySelector('#compared .value').textContent)", 3)
+
+    def test_shows_the_last_day(self):
+        self.open_chart("?device=" + CPU2)
+        hour = self.run_script(AXIS)
+        self.driver.find_element("css selector", "[data-span=day]").click()
+        self.wait_for(f"{AXIS}.join() !== arguments[0]", 5, ",".join(hour))
+        self.assertIn("span=day", self.driver.current_url)
+        self.assertEqual("true", self.run_script(
+            "document.querySelector('[data-span=day]').ariaPressed"))
+
+    def test_lists_the_states_in_words(self):
+        self.open_chart("?device=" + CPU2)
+        self.driver.find_element("css selector", "#chart summary").click()
+        states = self.run_script("[...document.querySelectorAll('#state-changes li')]"
+                                 ".map(item => item.innerText)")
+        self.assertIn("Warning high", states[0])
+        self.assertTrue(any("Normal" in state for state in states), states)
+
+    def test_draws_limits_and_states(self):
+        self.open_chart("?device=" + CPU2)
+        for name in ("--critical", "--warning-band"):
+            with self.subTest(name):
+                self.assertTrue(self.wait_for(
+                    "(() => { const probe = document.createElement('span');"
+                    "probe.style.color = `var(${arguments[0]})`; document.body.append(probe);"
+                    "const wanted = getComputedStyle(probe).color.match(/\\d+/g).map(Number);"
+                    "probe.remove(); return [...document.querySelectorAll('#plot canvas')]"
+                    ".some(canvas => { const {data} = canvas.getContext('2d').getImageData("
+                    "0, 0, canvas.width, canvas.height); for (let i = 0; i < data.length; i += 4)"
+                    " if (wanted.every((part, j) => data[i + j] === part) && data[i + 3] === 255)"
+                    " return true; return false; }); })()", 5, name))
+
+    def test_says_where_longer_histories_are(self):
+        self.open_chart("?device=" + CPU2)
+        self.assertIn("Prometheus", self.driver.find_element("id", "chart").text)
+
+    def test_says_when_there_is_no_history(self):
+        self.expected_errors = ("/api/history",)
+        self.open_chart("?device=" + CPU2)
+        self.server.keeps_history = False
+        self.driver.find_element("css selector", "[data-span=day]").click()
+        self.wait_for("document.querySelector('#plot-summary').textContent"
+                      " === 'No history is available.'")

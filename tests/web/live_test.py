@@ -1,0 +1,94 @@
+# Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+"""What the page shows while the machine changes."""
+
+import time
+
+from browser import PageTest
+from machine import Machine
+
+FAN = "/system/fan1"
+
+
+class LiveTest(PageTest):
+    def setUp(self):
+        super().setUp()
+        self.machine = Machine.demonstration()
+        self.server = self.serve(self.machine)
+        self.open(self.server)
+
+    def trouble_labels(self):
+        return self.run_script("[...document.querySelectorAll('#troubles .sensor button')]"
+                               ".map(each => each.textContent)")
+
+    def test_shows_a_crossed_limit_within_three_seconds(self):
+        self.assertNotIn("System Fan 1", self.trouble_labels())
+        self.machine.set_reading(FAN, 450)
+        self.wait_for("document.querySelector('#troubles').textContent"
+                      ".includes('System Fan 1')", 3)
+        self.assertIn("450\u00a0RPM", self.row_text("System Fan 1"))
+        self.assertIn("Critical low", self.row_text("System Fan 1"))
+        self.assertRegex(self.run_script("document.title"), r"^\(8\) ")
+        self.wait_for("document.querySelector('#announcement').textContent"
+                      ".includes('Critical low')", 3)
+        self.machine.set_reading(FAN, 5300)
+        self.wait_for("!document.querySelector('#troubles').textContent"
+                      ".includes('System Fan 1')", 3)
+
+    def test_orders_troubles_by_their_urgency(self):
+        self.assertEqual(
+            ["CPU 2 DIMM D1 Temp", "PSU 2 Fan", "PSU 2 Input", "System Fan 4", "Battery",
+             "CPU 2 Package Temp", "NVMe 2 Temp"], self.trouble_labels())
+        self.machine.set_reading("/system/cpu2/package", 97)
+        self.wait_for("document.querySelector('#troubles .sensor:nth-child(2) button')"
+                      ".textContent === 'CPU 2 Package Temp'", 3)
+
+    def test_shows_a_chip_that_vanishes_and_returns(self):
+        removed = self.machine.remove_chip("/system/psu1")
+        self.wait_for("document.querySelector('#counts [data-urgency=lost]')"
+                      ".dataset.number === '4'", 3)
+        self.assertRegex(self.row_text("PSU 1 Fan"), r"(?s)–.*Gone")
+        self.assertRegex(self.run_script(
+            "[...document.querySelectorAll('#troubles .sensor')]"
+            ".find(row => row.textContent.includes('PSU 1 Fan')).innerText"), r"since \d")
+        self.machine.add(removed)
+        self.wait_for("document.querySelector('#counts [data-urgency=lost]')"
+                      ".dataset.number === '1'", 3)
+        self.assertIn("7936\u00a0RPM", self.row_text("PSU 1 Fan"))
+
+    def test_adds_a_new_chip_at_its_place(self):
+        self.machine.add([{"type": "temperature", "path": "/system/cpu10/t", "baseUnits": 2,
+                           "description": "CPU 10", "status": 1, "reading": 40}])
+        self.wait_for("[...document.querySelectorAll('.chip-title')]"
+                      ".some(each => each.textContent === 'system/cpu10')", 3)
+        titles = self.run_script(
+            "[...document.querySelectorAll('.chip-title')].map(each => each.textContent)")
+        place = titles.index("system/cpu10")
+        self.assertEqual(["system/cpu2", "system/nic1"], [titles[place - 1], titles[place + 1]])
+
+    def test_survives_a_restart_of_the_server(self):
+        self.expected_errors = ("ERR_CONNECTION_REFUSED", "ERR_INCOMPLETE_CHUNKED_ENCODING",
+                                "ERR_CONNECTION_RESET", "ERR_EMPTY_RESPONSE")
+        self.server.stop()
+        self.wait_for("/^Connection lost since \\d/.test("
+                      "document.querySelector('#connection').textContent)", 3)
+        self.machine.set_reading(FAN, 600)
+        removed = self.machine.remove_chip("/system/nic1")
+        self.server.start()
+        self.wait_for("document.querySelector('#connection').textContent === 'Live'", 6)
+        self.assertIn("Warning low", self.row_text("System Fan 1"))
+        self.assertIn("Gone", self.row_text(removed[0]["description"]))
+
+    def test_closes_the_connection_while_the_page_is_hidden(self):
+        page = self.driver.current_window_handle
+        self.driver.switch_to.new_window("tab")
+        end = time.monotonic() + 3
+        while self.server.event_streams > 0 and time.monotonic() < end:
+            time.sleep(0.05)
+        hidden = self.server.event_streams
+        self.driver.close()
+        self.driver.switch_to.window(page)
+        self.assertEqual(0, hidden)
+        self.machine.set_reading(FAN, 450)
+        self.wait_for("document.querySelector('#troubles').textContent"
+                      ".includes('System Fan 1')", 3)

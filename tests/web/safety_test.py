@@ -1,0 +1,63 @@
+# Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+"""Names of sensors and chips are data, never markup."""
+
+from browser import PageTest
+from machine import Machine
+
+MARKUP = "<img src=x onerror=alert(1)><script>document.title='broken'</script>"
+TURNED = "\u202eTurned\u2066 \u200fleft"
+QUOTED = "\"'&amp;{{machine}}${1}"
+
+
+def node(path, label):
+    return {"type": "temperature", "path": path, "description": label, "status": 23,
+            "baseUnits": 2, "reading": 91, "upperNonCritical": 86, "possibleStates": [1, 23]}
+
+
+class SafetyTest(PageTest):
+    def setUp(self):
+        super().setUp()
+        self.labels = (MARKUP, TURNED, QUOTED)
+        self.server = self.serve(Machine([node("/a<b>/" + str(index), label)
+                                          for index, label in enumerate(self.labels)]))
+
+    def test_shows_markup_as_text(self):
+        self.open(self.server)
+        for label in self.labels:
+            self.assertIsNotNone(self.row_text(label), label)
+        self.assertEqual("a<b>", self.run_script("document.querySelector('.chip-title').textContent"))
+        self.assertEqual(0, self.run_script("document.querySelectorAll('img, main script, b b').length"))
+
+    def test_shows_markup_as_text_in_the_chart(self):
+        for index, label in enumerate(self.labels):
+            with self.subTest(label):
+                self.open(self.server)
+                self.driver.find_elements("css selector", ".chips .sensor")[0].click()
+                self.wait_for("document.querySelector('#plot canvas')")
+        self.driver.execute_script("const select = document.querySelector('#compare');"
+                                   "select.selectedIndex = 1;"
+                                   "select.dispatchEvent(new Event('change', {bubbles: true}))")
+        self.wait_for("document.querySelectorAll('#compared li').length === 2")
+        self.assertEqual(0, self.run_script("document.querySelectorAll('#chart img').length"))
+
+    def test_shows_markup_as_text_without_scripts(self):
+        self.look(has_scripts=False)
+        self.driver.get(self.server.address)
+        self.assertIn(MARKUP, self.driver.find_element("id", "table").text)
+        self.assertIn(QUOTED, self.driver.find_element("id", "table").text)
+
+    def test_isolates_the_direction_of_names(self):
+        self.open(self.server)
+        self.assertEqual("isolate", self.run_script(
+            "getComputedStyle(document.querySelector('.sensor bdi')).unicodeBidi"))
+
+    def test_is_refused_what_the_policy_forbids(self):
+        self.expected_errors = ("Content Security Policy",)
+        self.open(self.server)
+        self.driver.execute_script(
+            "const script = document.createElement('script');"
+            "script.textContent = 'window.ran = true'; document.body.append(script);"
+            "const span = document.createElement('span');"
+            "span.setAttribute('style', 'color: red'); document.body.append(span);")
+        self.assertIsNone(self.run_script("window.ran"))

@@ -1,0 +1,91 @@
+# Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+"""The search, its selectors and the address."""
+
+import ctypes
+import random
+
+from selenium.webdriver.common.keys import Keys
+
+from browser import PageTest
+from machine import Machine
+
+VISIBLE = ("[...document.querySelectorAll('.chips .sensor:not([hidden])')]"
+           ".map(row => row.querySelector('button').textContent)")
+
+
+class SearchTest(PageTest):
+    def setUp(self):
+        super().setUp()
+        self.server = self.serve(Machine.demonstration())
+
+    def search(self, text):
+        field = self.driver.find_element("name", "search")
+        field.clear()
+        field.send_keys(text)
+        return self.run_script(VISIBLE)
+
+    def test_finds_what_the_terminal_selects(self):
+        self.open(self.server)
+        for text, labels in {
+                "SYSTEM/PSU1": ["PSU 1 Fan", "PSU 1 Input", "PSU 1 Temp"],
+                '"psu 1 fan"': ["PSU 1 Fan"],
+                "system/psu1/vin": ["PSU 1 Input"],
+                "*/psu?/fan": ["PSU 1 Fan", "PSU 2 Fan"],
+                "/system/nvme[!1]/*": ["NVMe 2 Temp"],
+                "PSU*Fan:/system/psu1/fan": ["PSU 1 Fan"],
+                "kind:voltage *psu*": ["PSU 1 Input", "PSU 2 Input"],
+                "system/nvme1 system/nvme2": ["NVMe 1 Temp", "NVMe 2 Temp"],
+                "package cpu": ["CPU 1 Package Temp", "CPU 2 Package Temp"],
+                "nowhere": []}.items():
+            with self.subTest(text):
+                self.assertEqual(labels, self.search(text))
+        self.assertEqual("Shown: 0", self.run_script("document.querySelector('#found').innerText"))
+
+    def test_hides_chips_without_a_found_sensor(self):
+        self.open(self.server)
+        self.search("nvme 1")
+        self.assertEqual(["system/nvme1"], self.run_script(
+            "[...document.querySelectorAll('.chip:not([hidden]) .chip-title')]"
+            ".map(title => title.textContent)"))
+
+    def test_keeps_in_the_address_what_is_shown(self):
+        self.open(self.server)
+        self.search("kind:fan")
+        self.driver.find_element("name", "problems").click()
+        problems = ["System Fan 4", "PSU 2 Fan"]
+        self.assertEqual(problems, self.run_script(VISIBLE))
+        self.driver.get(self.driver.current_url)
+        self.wait_for(f"{VISIBLE}.length === 2")
+        self.assertEqual(problems, self.run_script(VISIBLE))
+        self.assertEqual("kind:fan", self.run_script("document.querySelector('[name=search]').value"))
+
+    def test_shows_a_sensor_that_becomes_a_problem(self):
+        self.open(self.server, "?problems=1&search=kind:fan")
+        self.server.machine.set_reading("/system/fan5", 100)
+        self.wait_for(f"{VISIBLE}.includes('System Fan 5')", 3)
+        self.assertEqual("Shown: 3", self.run_script("document.querySelector('#found').innerText"))
+
+    def test_matches_patterns_as_the_c_library_does(self):
+        self.open(self.server)
+        library = ctypes.CDLL(None)
+        no_escape, fold_case = 2, 16
+        picks = random.Random(15)
+        cases = [("".join(picks.choices("ab-]/.B*?[!^\\(", k=picks.randint(1, 7))),
+                  "".join(picks.choices("ab-]/.B\\(", k=picks.randint(0, 5)))) for _ in range(4000)]
+        cases += [("[]]", "]"), ("[!]a]", "b"), ("[a-c]*", "b/x"), ("[", "["), ("[a", "[a"),
+                  ("*.*", "a.b"), ("a?", "ab"), ("[z-a]", "z"), ("[^a]", "b"), ("ä*", "äb")]
+        expected = [library.fnmatch(pattern.encode(), name.encode(), no_escape | fold_case) == 0
+                    for pattern, name in cases]
+        actual = self.driver.execute_async_script(
+            "const [cases, done] = arguments;"
+            "import('/web/Selectors.js').then(({expressionOf}) => done(cases.map("
+            "([pattern, name]) => expressionOf(pattern).test(name.toLowerCase()))));", cases)
+        self.assertGreater(sum(expected), 50)
+        self.assertEqual([], [(case, isMatch) for case, isMatch, is_same in zip(
+            cases, expected, map(bool.__eq__, expected, actual)) if not is_same])
+
+    def test_clears_the_search_by_the_escape_key(self):
+        self.open(self.server, "?search=nvme")
+        self.driver.find_element("name", "search").send_keys(Keys.ESCAPE)
+        self.assertEqual(40, len(self.run_script(VISIBLE)))
