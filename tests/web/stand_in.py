@@ -233,10 +233,10 @@ class Handler(http.server.BaseHTTPRequestHandler):
         span = query.get("span", [""])[0]
         if not self.server_of.keeps_history:
             return self._json({"error": "no history is kept"}, 404)
-        if span not in INTERVALS:
-            return self._json({"error": "span must be hour or day"}, 400)
-        document = self.server_of.history(
-            span, query.get("device", []), int(query.get("points", ["0"])[0]))
+        devices, points = query.get("device", []), query.get("points", ["0"])[0]
+        if span not in INTERVALS or points not in ("0", "60") or (points == "0" and not devices):
+            return self._json({"error": "a parameter is wrong"}, 400)
+        document = self.server_of.history(span, devices, int(points))
         if document is None:
             return self._json({"error": "there is no such device"}, 404)
         return self._json(document)
