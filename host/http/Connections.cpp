@@ -4,6 +4,7 @@
 
 #include "host/http/Address.h"
 #include "host/http/EventLog.h"
+#include "host/http/Resource.h"
 
 #include <poll.h>
 #include <sys/socket.h>
@@ -100,6 +101,33 @@ void Connections::enter(ClientConnection& connection, Phase phase)
     connection.deadline = Clock::now() + timeoutOf(phase);
 }
 
+bool Connections::beginStream(ClientConnection& connection, Stream& stream)
+{
+    const std::lock_guard lock(mutex_);
+    if (isShuttingDown_ || exceedsLimitsOfStreams(connection))
+        return false;
+    connection.stream = &stream;
+    return true;
+}
+
+bool Connections::exceedsLimitsOfStreams(const ClientConnection& connection) const
+{
+    std::size_t all = 0;
+    std::size_t ofNetwork = 0;
+    for (const ClientConnection& each : all_) {
+        all += each.stream != nullptr ? 1 : 0;
+        ofNetwork += each.stream != nullptr && each.network == connection.network ? 1 : 0;
+    }
+    return all >= limits_.maximumConnections / 2 ||
+           ofNetwork >= limits_.maximumConnectionsPerAddress / 2;
+}
+
+void Connections::endStream(ClientConnection& connection) noexcept
+{
+    const std::lock_guard lock(mutex_);
+    connection.stream = nullptr;
+}
+
 std::chrono::seconds Connections::timeoutOf(Phase phase) const
 {
     switch (phase) {
@@ -125,6 +153,8 @@ void Connections::beginShutdown()
             ::shutdown(connection.descriptor, SHUT_RD);
         if (connection.phase == Phase::receiving)
             connection.deadline = std::min(connection.deadline, latest);
+        if (connection.stream != nullptr)
+            connection.stream->end();
     }
     changed_.notify_all();
 }
@@ -164,6 +194,14 @@ void Connections::watch(const std::stop_token& stop)
     }
 }
 
+void Connections::interrupt(ClientConnection& connection)
+{
+    connection.phase = Phase::working;
+    if (connection.stream != nullptr)
+        connection.stream->end();
+    changed_.notify_all();
+}
+
 std::vector<std::string> Connections::closeOverdue()
 {
     std::vector<std::string> lines;
@@ -171,8 +209,7 @@ std::vector<std::string> Connections::closeOverdue()
     for (ClientConnection& connection : all_) {
         if (connection.phase == Phase::waiting && hasClientClosed(connection.descriptor)) {
             ::shutdown(connection.descriptor, SHUT_RDWR);
-            connection.phase = Phase::working;
-            changed_.notify_all();
+            interrupt(connection);
         }
         if (connection.phase == Phase::working || connection.phase == Phase::waiting)
             continue;

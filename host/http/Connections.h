@@ -22,13 +22,16 @@
 
 namespace Host::Http {
 
+class Stream;
+
 enum class Phase {
     idle,      // between requests
     receiving, // a request arrives
     working,   // the server works on it: no timeout counts
-    waiting,   // its sign-in waits (see waitUntil): ends where the client closes the connection
+    waiting,   // its sign-in (see waitUntil) or its stream waits: ends where the client closes the
+               // connection
     answering, // the client fetches the answer
-    fetching,  // the client fetches a resource
+    fetching,  // the client fetches a resource or a piece of a stream
 };
 
 // An open connection. Connections owns it.
@@ -48,6 +51,7 @@ struct ClientConnection {
     // Guarded by the mutex of Connections.
     Phase phase = Phase::idle;
     std::chrono::steady_clock::time_point deadline{};
+    Stream* stream = nullptr; // that is the answer
 
     // Used by the connection's thread only.
     std::string target; // of the request that arrives
@@ -74,6 +78,11 @@ public:
 
     void enter(ClientConnection& connection, Phase phase);
 
+    // The stream is ended when the client closes the connection, and when the shutdown begins.
+    // Returns false where half of the connections, or of those of the address, are streams.
+    bool beginStream(ClientConnection& connection, Stream& stream);
+    void endStream(ClientConnection& connection) noexcept;
+
     // From now on no connection stays open for a further request. Idle connections are closed now,
     // the others after their answer, or soon when their request does not arrive. Idempotent.
     void beginShutdown();
@@ -95,6 +104,9 @@ private:
     std::vector<std::string> closeOverdue();
     std::chrono::seconds timeoutOf(Phase phase) const;
     bool exceedsLimitOfAddress(const Address& client) const;
+    bool exceedsLimitsOfStreams(const ClientConnection& connection) const;
+    // Ends what the connection waits for.
+    void interrupt(ClientConnection& connection);
 
     const Limits& limits_;
     mutable std::mutex mutex_;

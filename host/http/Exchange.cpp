@@ -77,8 +77,11 @@ bool Exchange::begin(const RequestHead& head, std::size_t headSize)
 
 void Exchange::findResource(const RequestHead& head)
 {
-    const auto found = service_.resources.find(pathOf(head));
-    if (found == service_.resources.end())
+    const std::string path = pathOf(head);
+    const auto found = service_.resources.find(path);
+    // Operations go to / as well as to /cimom.
+    const bool isOperation = path == "/" && head.method != "GET" && head.method != "HEAD";
+    if (found == service_.resources.end() || isOperation)
         return;
     resource_ = &found->second.get();
     resourceHead_ = head;
@@ -221,6 +224,9 @@ void Exchange::readResource()
 {
     const auto slot = takeSlot(service_.readers);
     representation_ = resource_->represent(resourceHead_);
+    if (representation_.stream)
+        stream_.emplace(std::move(representation_.stream), service_.connections, client_,
+            [this](Phase phase) { enter(phase); });
 }
 
 void Exchange::enter(Phase phase)
@@ -228,8 +234,9 @@ void Exchange::enter(Phase phase)
     service_.connections.enter(client_, phase);
     // To libmicrohttpd the client is silent while its request is worked on. The time counts anew
     // when a timeout follows none.
-    const auto timeout =
-        phase == Phase::working ? std::chrono::seconds(0) : service_.limits.idleTimeout;
+    const auto timeout = phase == Phase::working || phase == Phase::waiting
+                             ? std::chrono::seconds(0)
+                             : service_.limits.idleTimeout;
     ::MHD_set_connection_option(
         &connection_, MHD_CONNECTION_OPTION_TIMEOUT, static_cast<unsigned>(timeout.count()));
 }
@@ -248,12 +255,13 @@ bool Exchange::sendAnswer()
 
 bool Exchange::sendRepresentation()
 {
-    Response response = Response::whole(*representation_.content);
+    Response response =
+        stream_ ? Response::inPieces(*stream_) : Response::whole(*representation_.content);
     for (const HeaderField& field : representation_.fields)
         response.add(field);
     if (service_.connections.isShuttingDown())
         response.endConnection();
-    return send(response, MHD_HTTP_OK, Phase::fetching);
+    return send(response, representation_.status, Phase::fetching);
 }
 
 bool Exchange::sendError()

@@ -8,6 +8,7 @@
 #include "host/http/HttpError.h"
 #include "host/http/PendingAnswer.h"
 #include "host/http/Resource.h"
+#include "host/http/StreamedAnswer.h"
 
 #include <cstddef>
 #include <optional>
@@ -80,6 +81,7 @@ private:
 
     PendingAnswer answer_;
     Representation representation_;
+    std::optional<StreamedAnswer> stream_;
     std::string errorText_;
 };
 

@@ -46,6 +46,14 @@ bool isThisMachine(std::string_view host)
     }
 }
 
+std::string formDecoded(std::string_view text)
+{
+    std::string result(text);
+    std::replace(result.begin(), result.end(), '+', ' ');
+    result.resize(::MHD_http_unescape(result.data()));
+    return result;
+}
+
 double weightIn(const ParameterizedValue& range)
 {
     double weight = 1;
@@ -75,6 +83,34 @@ void checkResourceRequest(const RequestHead& head, bool isLoopback)
         throw HttpError(MHD_HTTP_MISDIRECTED_REQUEST,
             "through a loopback address, the Host must be localhost, a loopback address or " +
                 ownName());
+}
+
+std::vector<WeightedElement> weightedElements(const RequestHead& head, std::string_view field)
+{
+    std::vector<WeightedElement> elements;
+    for (const HeaderField& each : head.fields)
+        if (equalNames(each.name, field))
+            for (const std::string_view element : parseList(each.value)) {
+                const ParameterizedValue parsed = parseParameters(element);
+                elements.push_back({parsed.value, weightIn(parsed)});
+            }
+    return elements;
+}
+
+std::vector<std::pair<std::string, std::string>> queryOf(const RequestHead& head)
+{
+    std::vector<std::pair<std::string, std::string>> query;
+    const std::size_t begin = head.target.find('?');
+    std::string_view rest =
+        begin == std::string::npos ? "" : std::string_view(head.target).substr(begin + 1);
+    while (!rest.empty()) {
+        const std::string_view argument = rest.substr(0, rest.find('&'));
+        rest.remove_prefix(std::min(argument.size() + 1, rest.size()));
+        const std::size_t equals = std::min(argument.find('='), argument.size());
+        query.emplace_back(formDecoded(argument.substr(0, equals)),
+            formDecoded(argument.substr(std::min(equals + 1, argument.size()))));
+    }
+    return query;
 }
 
 double weightOf(const RequestHead& head, std::string_view mediaType, std::string_view version)

@@ -3,6 +3,7 @@
 #include "host/http/Response.h"
 
 #include "host/http/PendingAnswer.h"
+#include "host/http/StreamedAnswer.h"
 
 #include <microhttpd.h>
 
@@ -16,9 +17,17 @@ namespace {
 
 constexpr std::size_t pieceSize = std::size_t{32} << 10;
 
+template <typename Answer>
 ::ssize_t readPiece(void* answer, std::uint64_t, char* to, std::size_t room)
 {
-    return static_cast<PendingAnswer*>(answer)->read(to, room);
+    return static_cast<Answer*>(answer)->read(to, room);
+}
+
+template <typename Answer>
+MHD_Response* responseFrom(Answer& answer)
+{
+    return ::MHD_create_response_from_callback(
+        MHD_SIZE_UNKNOWN, pieceSize, &readPiece<Answer>, &answer, nullptr);
 }
 
 } // namespace
@@ -43,8 +52,12 @@ Response Response::whole(const std::string& text)
 
 Response Response::inPieces(PendingAnswer& answer)
 {
-    return Response(::MHD_create_response_from_callback(
-        MHD_SIZE_UNKNOWN, pieceSize, &readPiece, &answer, nullptr));
+    return Response(responseFrom(answer));
+}
+
+Response Response::inPieces(StreamedAnswer& answer)
+{
+    return Response(responseFrom(answer));
 }
 
 void Response::add(const HeaderField& field)

@@ -13,6 +13,7 @@ struct MHD_Response;
 namespace Host::Http {
 
 class PendingAnswer;
+class StreamedAnswer;
 
 // The header fields and the body of an answer, as libmicrohttpd sends them. All functions throw
 // std::bad_alloc.
@@ -22,6 +23,7 @@ public:
     static Response whole(const std::string& text);
     // Creates one whose body is read from the answer, which must exist until the request ends.
     static Response inPieces(PendingAnswer& answer);
+    static Response inPieces(StreamedAnswer& answer);
 
     void add(const HeaderField& field);
     // Has the connection closed after the answer, which says so.
