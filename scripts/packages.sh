@@ -21,6 +21,7 @@ check_packages=(
   freeipmi-tools ipmitool libopenipmi-dev openipmi
   prometheus prometheus-alertmanager prometheus-node-exporter victoria-metrics
   python3-prometheus-client python3-yaml
+  chromium chromium-driver fonts-ipafont-gothic libjs-dygraphs poppler-utils python3-selenium
   debootstrap dpkg-dev file iproute2 jq lintian man-db mandoc rpm rpmlint shellcheck systemd valgrind
 )
 

@@ -6,7 +6,8 @@ import { nameOf, stateWords } from './SensorRow.js';
 import { isProblem } from './States.js';
 import { isolated, text } from './Texts.js';
 
-const leastInterval = 5_000; // a screen reader needs time to speak
+const collectingTime = 1_000; // changes often come together
+const speakingTime = 5_000;
 const mostSensors = 3;
 
 /** Announces the sensors whose state became or ceased to be a problem. */
@@ -24,7 +25,7 @@ export class Announcer {
                     this.#waiting.set(sensor.deviceId, sensor);
             });
             if (this.#waiting.size > 0)
-                this.#timer ??= setTimeout(() => this.#announce(), leastInterval / 5);
+                this.#timer ??= setTimeout(() => this.#announce(), collectingTime);
         });
     }
 
@@ -40,6 +41,6 @@ export class Announcer {
             this.#timer = null;
             if (this.#waiting.size > 0)
                 this.#announce();
-        }, leastInterval);
+        }, speakingTime);
     }
 }

@@ -12,16 +12,15 @@ export const mostSensors = dashes.length;
 export const seriesColor = (index) => styleValue(`--series-${index + 1}`);
 
 /**
- * Loads dygraphs when the first chart is shown. Its legend makes markup of labels and sets styles in
- * a way that the Content-Security-Policy forbids, so it is removed.
+ * Loads dygraphs, for the first chart. Its legend makes markup of labels and sets styles in a way
+ * that the Content-Security-Policy forbids, so it is removed.
  */
-async function loadDygraph() {
-    if (!window.Dygraph) {
-        await import('/web/dygraph.min.js');
-        const { Dygraph } = window;
-        Dygraph.PLUGINS = Dygraph.PLUGINS.filter((plugin) => plugin !== Dygraph.Plugins.Legend);
-    }
-    return window.Dygraph;
+export async function loadDygraphs() {
+    if (window.Dygraph)
+        return;
+    await import('/web/dygraph.min.js');
+    const { Dygraph } = window;
+    Dygraph.PLUGINS = Dygraph.PLUGINS.filter((plugin) => plugin !== Dygraph.Plugins.Legend);
 }
 
 /** Returns the range of the value axis: all readings and limits, with a margin. */
@@ -49,31 +48,36 @@ export class Chart {
         this.onPoint = onPoint;
     }
 
-    /** Shows the history; the limits are those of `sensor`. A zoom is kept for the same sensors. */
-    async show(history, sensor) {
-        const Dygraph = await loadDygraph();
+    /**
+     * Shows the history; the limits are those of `sensor`. A zoom is kept for the same sensors.
+     * Needs dygraphs.
+     */
+    show(history, sensor) {
         this.#underlay = { sensor, runsOfSensors: history.sensors.map(
             (each) => stateRunsOf(each, history)) };
         const labels = ['time', ...history.sensors.map((_, index) => `${index}`)];
-        const key = JSON.stringify([history.span, history.sensors.map((each) => each.deviceId)]);
+        const shown = JSON.stringify([history.span, history.sensors.map((each) => each.deviceId)]);
         const options = { file: rowsOf(history), valueRange: valueRangeOf(history, sensor) };
-        if (this.#dygraph && key === this.#shown) {
+        if (this.#dygraph && shown === this.#shown) {
             this.#dygraph.updateOptions(this.#dygraph.isZoomed() ? { file: options.file } : options);
             return;
         }
-        this.#shown = key;
-        this.#dygraph?.destroy();
-        this.#dygraph = new Dygraph(this.element, options.file, {
+        this.#shown = shown;
+        this.remove();
+        this.#dygraph = new window.Dygraph(this.element, options.file, {
             ...this.#fixedOptions(history), labels, valueRange: options.valueRange });
     }
 
-    /** Draws the whole chart the next time, so that it takes the colors of the style sheet. */
-    forget() {
-        this.#shown = '';
+    /** Removes the chart, so that the next one takes the panel's size and colors anew. */
+    remove() {
+        this.#dygraph?.destroy();
+        this.#dygraph = null;
     }
 
     /** Shows the part of the time that begins and ends at these parts of what is shown. */
     zoom(begin, end) {
+        if (!this.#dygraph)
+            return;
         const [left, right] = this.#dygraph.xAxisRange();
         const [first, last] = this.#dygraph.xAxisExtremes();
         const low = Math.max(first, left + begin * (right - left));
@@ -83,7 +87,7 @@ export class Chart {
     }
 
     showAll() {
-        this.#dygraph.resetZoom();
+        this.#dygraph?.resetZoom();
     }
 
     #fixedOptions({ span, sensors }) {

@@ -2,7 +2,7 @@
 
 // The panel with the chart and its buttons. What it shows is in the address.
 
-import { Chart, mostSensors } from './Chart.js';
+import { Chart, loadDygraphs, mostSensors } from './Chart.js';
 import { loadHistory } from './ChartData.js';
 import { ChartLegend } from './ChartLegend.js';
 import { fillStateChanges, summaryText } from './ChartWords.js';
@@ -36,7 +36,7 @@ export class ChartPanel {
         this.comparison.addEventListener('change', () =>
             this.#set([...this.devices, this.comparison.value]));
         matchMedia('(prefers-color-scheme: dark)').addEventListener('change', () => {
-            this.chart.forget();
+            this.chart.remove();
             this.show();
         });
     }
@@ -47,8 +47,10 @@ export class ChartPanel {
         this.devices = address.devices.filter((id) => machine.sensors.has(id)).slice(0, mostSensors);
         this.panel.hidden = this.devices.length === 0;
         clearTimeout(this.#timer);
-        if (this.panel.hidden)
+        if (this.panel.hidden) {
+            this.chart.remove();
             return;
+        }
         const sensors = this.#sensors();
         this.title.firstElementChild.textContent = nameOf(sensors[0]);
         for (const button of this.panel.querySelectorAll('[data-span]'))
@@ -95,7 +97,8 @@ export class ChartPanel {
     /** Draws the history that the server has now, and again when there is more of it. */
     async #draw() {
         const { devices, address: { span } } = this;
-        const history = await loadHistory(devices, span).catch(() => undefined);
+        const [history] = await Promise.all([loadHistory(devices, span), loadDygraphs()])
+            .catch(() => [null]); // there is no connection
         if (devices !== this.devices || span !== this.address.span)
             return;
         const sensors = this.#sensors();
@@ -103,7 +106,7 @@ export class ChartPanel {
         document.getElementById('plot-summary').textContent =
             history ? summaryText(history, sensors) : text('noHistory');
         if (history) {
-            await this.chart.show(history, sensors[0]);
+            this.chart.show(history, sensors[0]);
             this.legend.setHistory(history);
             fillStateChanges(document.getElementById('state-changes'), history);
         }

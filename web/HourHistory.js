@@ -4,28 +4,31 @@
 
 const points = 60;
 
-/** Reads the history once and continues it with the readings of the machine. */
 export class HourHistory {
     #values = new Map(); // by deviceId, at most `points` of them
+    #timer = 0;
 
     constructor(machine) {
         this.machine = machine;
     }
 
-    /** Sets also since when the sensors are in their states. Does nothing without a history. */
+    /**
+     * Reads the history, which the readings of the machine continue until the next call. Sets also
+     * since when the sensors are in their states. Does nothing where there is no history.
+     */
     async load() {
         const response = await fetch(`/api/history?span=hour&points=${points}`);
         if (!response.ok)
             return;
         const { interval, end, sensors } = await response.json();
-        for (const { deviceId, values } of sensors)
-            this.#values.set(deviceId, values.slice(-points));
-        this.machine.setSince(sensors.flatMap(({ deviceId, states }) => {
-            const [state, count] = states.at(-1) ?? [null, 0];
-            const isSinceEarlier = states.length === 1;
-            return [{ deviceId, state, since: end - count * interval, isSinceEarlier }];
+        this.#values = new Map(sensors.map(({ deviceId, values }) => [deviceId, values]));
+        this.machine.setSince(sensors.map(({ deviceId, states }) => {
+            const [state, count] = states.at(-1);
+            return { deviceId, state, since: end - count * interval,
+                isSinceEarlier: states.length === 1 };
         }));
-        setInterval(() => this.#continue(), interval * 1000);
+        clearInterval(this.#timer);
+        this.#timer = setInterval(() => this.#continue(), interval * 1000);
     }
 
     /** Returns the readings of the last hour and the present one, the oldest first. */
@@ -36,8 +39,7 @@ export class HourHistory {
 
     #continue() {
         for (const { deviceId, value } of this.machine.sensors.values()) {
-            const values = this.#values.get(deviceId) ?? [];
-            values.push(value);
+            const values = [...(this.#values.get(deviceId) ?? []), value];
             this.#values.set(deviceId, values.slice(-points));
         }
     }

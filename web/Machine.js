@@ -16,11 +16,12 @@ export function compareSensors(first, second) {
 /**
  * A sensor is an object of `/api/sensors` with
  * - `urgency`, one of States.js;
- * - `isGone`: the machine does not have the sensor any more; its last reading is removed;
+ * - `isGone`: the machine does not have the sensor any more;
  * - `since`: the time of Unix at which its state began, null while that is unknown;
- * - `isSinceEarlier`: the state began before `since`, which is the beginning of the history.
+ * - `isSinceEarlier`: the state began at an unknown time before `since`.
  *
- * Dispatches `change`, whose `detail` has the sensors that were added or changed.
+ * Dispatches `change`, whose `detail` has the sensors that were added or have changed, and what
+ * they were before.
  */
 export class Machine extends EventTarget {
     sensors = new Map(); // by deviceId
@@ -29,38 +30,24 @@ export class Machine extends EventTarget {
     replace(list) {
         const listed = new Set(list.map((sensor) => sensor.deviceId));
         const gone = [...this.sensors.keys()].filter((deviceId) => !listed.has(deviceId));
-        this.apply({ time: Math.floor(Date.now() / 1000), sensors: list, gone }, true);
+        this.#change(list, gone, { since: Math.floor(Date.now() / 1000), isSinceEarlier: true },
+            { since: null, isSinceEarlier: false });
     }
 
     /** Takes an event of changes. */
-    apply({ time, sensors, gone }, isWholeList = false) {
-        const changed = [];
-        for (const sensor of sensors) {
-            const known = this.sensors.get(sensor.deviceId);
-            const isSame = known && !known.isGone && known.state === sensor.state;
-            changed.push({
-                ...sensor,
-                urgency: urgencyOf(sensor.state),
-                isGone: false,
-                since: isSame ? known.since : known || !isWholeList ? time : null,
-                isSinceEarlier: isSame && known.isSinceEarlier,
-            });
-        }
-        for (const deviceId of gone) {
-            const known = this.sensors.get(deviceId);
-            if (known && !known.isGone)
-                changed.push({ ...known, value: null, urgency: 'lost', isGone: true, since: time,
-                    isSinceEarlier: false });
-        }
-        this.#store(changed);
+    apply({ time, sensors, gone }) {
+        const beginning = { since: time, isSinceEarlier: false };
+        this.#change(sensors, gone, beginning, beginning);
     }
 
-    /** Sets since when sensors are in their state, where that is unknown yet. */
+    /** Sets since when sensors are in their states, where the history knows better. */
     setSince(beginnings) {
         const changed = [];
         for (const { deviceId, state, since, isSinceEarlier } of beginnings) {
             const known = this.sensors.get(deviceId);
-            if (known && known.since === null && known.state === state)
+            const isKnown = known && (known.isGone ? null : known.state) === state;
+            if (isKnown && (known.since === null ||
+                (known.isSinceEarlier && (!isSinceEarlier || since < known.since))))
                 changed.push({ ...known, since, isSinceEarlier });
         }
         this.#store(changed);
@@ -69,6 +56,23 @@ export class Machine extends EventTarget {
     /** Returns the sensors that a person should look at. */
     troubles() {
         return [...this.sensors.values()].filter((sensor) => isProblem(sensor.urgency));
+    }
+
+    /** Takes sensors; states began at `beginning`, and those of new sensors at `newBeginning`. */
+    #change(sensors, gone, beginning, newBeginning) {
+        const changed = sensors.map((sensor) => {
+            const known = this.sensors.get(sensor.deviceId);
+            const isSame = known && !known.isGone && known.state === sensor.state;
+            const { since, isSinceEarlier } = isSame ? known : known ? beginning : newBeginning;
+            const urgency = urgencyOf(sensor.state);
+            return { ...sensor, urgency, isGone: false, since, isSinceEarlier };
+        });
+        for (const deviceId of gone) {
+            const known = this.sensors.get(deviceId);
+            if (known && !known.isGone)
+                changed.push({ ...known, value: null, urgency: 'lost', isGone: true, ...beginning });
+        }
+        this.#store(changed);
     }
 
     #store(changed) {

@@ -43,21 +43,25 @@ function showConnection(lostSince) {
     document.body.classList.toggle('offline', lostSince !== null);
 }
 
-let isFirst = true;
+let isShown = false;
 
-function receive(name, data) {
-    if (name === 'sensors')
-        machine.replace(data);
-    else
-        machine.apply(data);
-    if (!isFirst)
-        return;
-    isFirst = false;
+function showOverview() {
+    isShown = true;
     overview.show();
     overview.search();
     showChart();
     new Announcer(machine);
-    hourHistory.load().then(() => sparklines.drawVisible());
+}
+
+function receive(name, data) {
+    if (name === 'changes') {
+        machine.apply(data);
+        return;
+    }
+    machine.replace(data);
+    if (!isShown)
+        showOverview();
+    hourHistory.load().then(() => sparklines.drawVisible(), () => {}); // the next list tries again
 }
 
 address.addEventListener('change', () => {

@@ -83,8 +83,9 @@ class AppearanceTest(PageTest):
         self.assertNotIn("unknown", urgencies)
 
     def test_is_a_table_without_scripts(self):
-        self.look(has_scripts=False)
+        self.look(has_scripts=False, width=375)
         self.driver.get(self.server.address)
+        self.assertLessEqual(self.run_script("document.documentElement.scrollWidth"), 375)
         table = self.driver.find_element("id", "table").text
         self.assertIn("CPU 2 DIMM D1 Temp", table)
         self.assertIn("Critical high", table)

@@ -78,6 +78,13 @@ class ChartTest(PageTest):
         self.assertEqual("true", self.run_script(
             "document.querySelector('[data-span=day]').ariaPressed"))
 
+    def test_takes_the_size_of_the_window_when_it_opens_again(self):
+        self.open_chart("?device=" + CPU2)
+        self.driver.find_element("id", "chart-close").click()
+        self.look(width=1000)
+        self.driver.back()
+        self.wait_for("document.querySelector('#plot canvas')?.clientWidth > 900")
+
     def test_lists_the_states_in_words(self):
         self.open_chart("?device=" + CPU2)
         self.driver.find_element("css selector", "#chart summary").click()

@@ -78,6 +78,8 @@ class LiveTest(PageTest):
         self.wait_for("document.querySelector('#connection').textContent === 'Live'", 6)
         self.assertIn("Warning low", self.row_text("System Fan 1"))
         self.assertIn("Gone", self.row_text(removed[0]["description"]))
+        self.assertIn("since before", self.run_script(
+            "document.querySelector('#troubles').textContent"))
 
     def test_closes_the_connection_while_the_page_is_hidden(self):
         page = self.driver.current_window_handle
@@ -92,3 +94,9 @@ class LiveTest(PageTest):
         self.machine.set_reading(FAN, 450)
         self.wait_for("document.querySelector('#troubles').textContent"
                       ".includes('System Fan 1')", 3)
+
+    def test_says_that_there_is_no_sensor(self):
+        line = self.driver.find_element("class name", "none")
+        self.assertFalse(line.is_displayed())
+        self.open(self.server, "?search=nothing+has+this+name")
+        self.assertTrue(self.driver.find_element("class name", "none").is_displayed())
