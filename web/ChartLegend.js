@@ -40,9 +40,12 @@ export class ChartLegend {
         this.list.replaceChildren(...sensors.map((sensor, index) => {
             const item = document.createElement('li');
             const name = document.createElement('bdi');
+            const chip = document.createElement('bdi');
             name.textContent = nameOf(sensor);
+            chip.textContent = sensor.chip;
+            chip.className = 'chip-name';
             this.#values[index].className = 'value';
-            item.append(sampleLine(index), name, this.#values[index]);
+            item.append(sampleLine(index), name, chip, this.#values[index]);
             if (sensors.length > 1)
                 item.append(this.#removeButton(sensor));
             return item;
