@@ -14,24 +14,16 @@ export async function loadHistory(devices, span) {
     return response.ok ? response.json() : null;
 }
 
-/** Returns the beginning of each sample of a sensor in milliseconds, and their end. */
-export function timesOf({ end, interval }, count) {
-    return Array.from({ length: count + 1 }, (_, i) => 1000 * (end - (count - i) * interval));
-}
-
 /**
  * Returns rows for dygraphs: a time, and for each sensor its reading or, of a day, an array with
  * minimum, mean and maximum.
  */
-export function rowsOf(history) {
-    const { span, sensors } = history;
-    const series = sensors.map(({ values, minimum, mean, maximum }) => span === 'hour' ? values
-        : mean.map((value, i) => value === null ? [null, null, null]
-            : [minimum[i], value, maximum[i]]));
-    const count = Math.max(...series.map((values) => values.length));
-    return timesOf(history, count).slice(0, -1).map((time, row) => [new Date(time),
-        ...series.map((values) => values[row - (count - values.length)] ??
-            (span === 'hour' ? null : [null, null, null]))]);
+export function rowsOf({ interval, end, sensors }) {
+    const series = sensors.map(({ values, minimum, mean, maximum }) =>
+        values ?? mean.map((value, i) => [minimum[i], value, maximum[i]]));
+    const count = series[0].length;
+    return series[0].map((_, i) => [new Date(1000 * (end - (count - i) * interval)),
+        ...series.map((values) => values[i])]);
 }
 
 /** Returns the least, the mean and the greatest reading of a sensor's history; null for none. */

@@ -4,8 +4,8 @@
 
 import { dashes, seriesColor } from './Chart.js';
 import { rowsOf } from './ChartData.js';
-import { nameOf, readingWords } from './SensorRow.js';
-import { readingText, text, exactTimeText } from './Texts.js';
+import { nameOf } from './SensorRow.js';
+import { exactTimeText, readingText, text } from './Texts.js';
 
 const namespace = 'http://www.w3.org/2000/svg';
 
@@ -61,11 +61,10 @@ export class ChartLegend {
     showRow(row) {
         const [time, ...values] = this.#rows[row] ?? [];
         this.#sensors.forEach((sensor, index) => {
-            const value = values[index]?.[1] ?? values[index] ?? null;
-            this.#values[index].textContent = !time ? readingWords(sensor)
-                : typeof value !== 'number' ? `– (${exactTimeText(time / 1000)})`
-                    : `${readingText(value, sensor.unit)}\u00a0${sensor.unit ?? ''} ` +
-                        `(${exactTimeText(time / 1000)})`;
+            const then = Array.isArray(values[index]) ? values[index][1] : values[index];
+            this.#values[index].textContent = time
+                ? `${readingText(then, sensor.unit)} (${exactTimeText(time / 1000)})`
+                : readingText(sensor.value, sensor.unit);
         });
     }
 

@@ -25,8 +25,10 @@ export class ChartPanel {
         this.panel = document.getElementById('chart');
         this.title = document.getElementById('chart-title');
         this.comparison = document.getElementById('compare');
-        this.legend = new ChartLegend((device) =>
-            this.#set(this.devices.filter((other) => other !== device)));
+        this.legend = new ChartLegend((device) => {
+            this.#set(this.devices.filter((other) => other !== device));
+            this.focus(); // the button that was pressed is gone
+        });
         this.chart = new Chart(document.getElementById('plot'), (row) => this.legend.showRow(row));
         this.panel.addEventListener('click', ({ target }) => this.#click(target));
         this.panel.addEventListener('keydown', ({ key }) => {

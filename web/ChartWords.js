@@ -4,7 +4,7 @@
 
 import { extremesOf, stateRunsOf } from './ChartData.js';
 import { nameOf } from './SensorRow.js';
-import { isolated, readingText, stateText, text, exactTimeText } from './Texts.js';
+import { exactTimeText, isolated, readingText, stateText, text } from './Texts.js';
 
 /** Returns a sentence for each sensor: its least, mean and greatest reading. */
 export function summaryText(history, sensors) {
@@ -13,8 +13,7 @@ export function summaryText(history, sensors) {
         const extremes = extremesOf(history.sensors[index]);
         if (extremes === null)
             return text('noReadings', { name });
-        const quantity = (value) =>
-            `${readingText(value, sensor.unit)}\u00a0${sensor.unit ?? ''}`;
+        const quantity = (value) => readingText(value, sensor.unit);
         return text('extremes', { name, least: quantity(extremes.least),
             mean: quantity(extremes.mean), greatest: quantity(extremes.greatest) });
     }).join(' ');

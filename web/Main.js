@@ -10,7 +10,7 @@ import { HourHistory } from './HourHistory.js';
 import { Machine } from './Machine.js';
 import { Overview } from './Overview.js';
 import { Sparklines } from './Sparkline.js';
-import { loadTexts, text, timeText } from './Texts.js';
+import { loadTexts, setText, text, timeText } from './Texts.js';
 
 const texts = loadTexts();
 const address = new Address();
@@ -31,15 +31,13 @@ function showChart() {
     overview.markShown(address.devices);
     panel.show();
     if (address.devices.length === 0 && last)
-        overview.focus(last);
+        overview.returnFocus(last);
 }
 
 function showConnection(lostSince) {
-    const element = document.getElementById('connection');
     const words = lostSince === null ? text('live')
         : text('connectionLost', { time: timeText(lostSince / 1000) });
-    if (element.textContent !== words)
-        element.textContent = words;
+    setText(document.getElementById('connection'), words);
     document.body.classList.toggle('offline', lostSince !== null);
 }
 

@@ -5,11 +5,12 @@
 import { ChipList } from './ChipList.js';
 import { searchFor } from './Selectors.js';
 import { isProblem, urgencies } from './States.js';
-import { text } from './Texts.js';
+import { setText, text } from './Texts.js';
 import { TroubleList } from './TroubleList.js';
 
 export class Overview {
     #shown = [];
+    #opener = null; // of the chart
 
     /** Calls `onOpen` with the deviceId of a sensor that the user chooses. */
     constructor(machine, sparklines, address, onOpen) {
@@ -29,8 +30,10 @@ export class Overview {
         });
         document.getElementById('overview').addEventListener('click', (event) => {
             const row = event.target.closest('.sensor');
-            if (row)
-                onOpen(row.dataset.device);
+            if (!row)
+                return;
+            this.#opener = row.querySelector('button');
+            onOpen(row.dataset.device);
         });
     }
 
@@ -63,17 +66,16 @@ export class Overview {
         this.#shown = devices;
     }
 
-    /** Moves the focus to a sensor's row. */
-    focus(device) {
-        this.chips.row(device)?.button.focus();
+    /** Moves the focus to what opened the chart; where that is gone, to the sensor's row. */
+    returnFocus(device) {
+        const opener = this.#opener?.isConnected ? this.#opener : this.chips.row(device).button;
+        opener.focus();
     }
 
     #showFound() {
         const { search, hasProblemsOnly } = this.address;
         const isLimited = search !== '' || hasProblemsOnly;
-        const words = isLimited ? text('found', { number: this.chips.visible }) : '';
-        if (this.found.textContent !== words)
-            this.found.textContent = words;
+        setText(this.found, isLimited ? text('found', { number: this.chips.visible }) : '');
     }
 
     #update(changed) {
@@ -81,7 +83,7 @@ export class Overview {
         this.troubles.update(changed);
         this.chips.update(changed);
         if (focused && !document.activeElement.closest('.sensor'))
-            this.focus(focused); // its row among the troubles was removed
+            this.chips.row(focused).button.focus(); // its row among the troubles was removed
         this.markShown(this.#shown);
         this.#showFound();
         this.#count();
@@ -93,10 +95,8 @@ export class Overview {
             ++numbers[sensor.urgency];
         for (const item of this.counts.children) {
             const number = String(numbers[item.dataset.urgency]);
-            if (item.dataset.number !== number) {
-                item.dataset.number = number;
-                item.querySelector('b').textContent = number;
-            }
+            item.dataset.number = number;
+            setText(item.querySelector('b'), number);
         }
         const problems = this.machine.troubles().length;
         const name = document.querySelector('h1').textContent;

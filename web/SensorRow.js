@@ -4,7 +4,7 @@
 
 import { Gauge } from './Gauge.js';
 import { shapes } from './States.js';
-import { readingText, stateText, text, timeText } from './Texts.js';
+import { readingText, setText, stateText, text, timeText } from './Texts.js';
 
 const template = document.getElementById('sensor-template').content.firstElementChild;
 
@@ -15,21 +15,11 @@ export const nameOf = (sensor) => sensor.label ?? sensor.deviceId;
 export const stateWords = (sensor) =>
     sensor.isGone ? text('gone') : stateText(sensor.state);
 
-/** Returns the reading with its unit; a dash for none. */
-export const readingWords = (sensor) => sensor.value === null ? '–'
-    : `${readingText(sensor.value, sensor.unit)}\u00a0${sensor.unit ?? ''}`;
-
 /** Returns since when the sensor is in its state; an empty text while that is unknown. */
 export function sinceWords(sensor) {
     if (sensor.since === null)
         return '';
     return text(sensor.isSinceEarlier ? 'sinceBefore' : 'since', { time: timeText(sensor.since) });
-}
-
-/** Sets a text only when it differs, since setting it costs a layout. */
-function setText(element, value) {
-    if (element.textContent !== value)
-        element.textContent = value;
 }
 
 /** Keeps the element of one sensor up to date. Sensors' texts never become markup. */
@@ -56,7 +46,7 @@ export class SensorRow {
             this.element.dataset.urgency = sensor.urgency;
             this.shape.setAttribute('d', shapes[sensor.urgency]);
         }
-        setText(this.reading, readingWords(sensor));
+        setText(this.reading, readingText(sensor.value, sensor.unit));
         setText(this.word, stateWords(sensor));
         setText(this.since, sensor.urgency === 'normal' ? '' : sinceWords(sensor));
         this.gauge.update(sensor);

@@ -3,7 +3,7 @@
 // Texts, numbers and times in the language of the page, which the server has chosen.
 
 const language = document.documentElement.lang;
-const region = navigator.languages.find((each) => each.startsWith(language)) ?? language;
+const locale = navigator.languages.find((each) => each.startsWith(language)) ?? language;
 let dictionary = {};
 
 /** Loads the texts of the page's language. The other functions need them. */
@@ -21,31 +21,42 @@ export function text(name, values = {}) {
 export const stateText = (state) => dictionary.states[state] ?? state;
 export const limitText = (limit) => dictionary.limitNames[limit];
 
+/** Sets an element's text only when it differs, since setting it costs a layout. */
+export function setText(element, words) {
+    if (element.textContent !== words)
+        element.textContent = words;
+}
+
 /** Isolates data within a text, so that its direction does not change that of the neighbours. */
 export const isolated = (data) => `\u2068${data}\u2069`;
 
 const decimals = { '°C': 1, 'V': 2, 'RPM': 0 };
 const formats = new Map();
 
-/** Returns a reading with as many decimals as people compare readings of its unit by. */
+/**
+ * Returns a reading and its unit, with as many decimals as people compare readings of that unit by;
+ * a dash for no reading.
+ */
 export function readingText(value, unit) {
+    if (value === null)
+        return '–';
     const digits = Math.abs(value) < 1 && unit === 'V' ? 3 : (decimals[unit] ?? 2);
     if (!formats.has(digits))
-        formats.set(digits, new Intl.NumberFormat(region,
+        formats.set(digits, new Intl.NumberFormat(locale,
             { minimumFractionDigits: digits, maximumFractionDigits: digits, useGrouping: 'min2' }));
-    return formats.get(digits).format(value);
+    return formats.get(digits).format(value) + (unit ? `\u00a0${unit}` : '');
 }
 
-const exact = new Intl.NumberFormat(region, { maximumFractionDigits: 6, useGrouping: 'min2' });
+const exact = new Intl.NumberFormat(locale, { maximumFractionDigits: 6, useGrouping: 'min2' });
 
 /** Returns a number in full, with its unit where it has one. */
 export function quantityText(value, unit) {
     return exact.format(value) + (unit ? `\u00a0${unit}` : '');
 }
 
-const timeOfDay = new Intl.DateTimeFormat(region, { timeStyle: 'short' });
-const dayAndTime = new Intl.DateTimeFormat(region, { dateStyle: 'short', timeStyle: 'short' });
-const exactTime = new Intl.DateTimeFormat(region, { timeStyle: 'medium' });
+const timeOfDay = new Intl.DateTimeFormat(locale, { timeStyle: 'short' });
+const dayAndTime = new Intl.DateTimeFormat(locale, { dateStyle: 'short', timeStyle: 'short' });
+const exactTime = new Intl.DateTimeFormat(locale, { timeStyle: 'medium' });
 
 /** Returns a time of Unix in the browser's zone: with the date unless it is of today. */
 export function timeText(seconds) {

@@ -21,16 +21,15 @@ class AccessibilityTest(PageTest):
                 for each in found for node in each["nodes"]]
 
     def test_has_no_violation(self):
-        for scheme in ("light", "dark"):
-            for width in (375, 1280):
-                with self.subTest(scheme=scheme, width=width):
-                    self.look(width, 900, scheme)
-                    self.open(self.server)
-                    self.assertEqual([], self.violations())
-            self.open(self.server, "?device=Battery:/system/board/vbat"
-                                   "&device=12 V:/system/board/12v")
-            self.wait_for("document.querySelector('#plot canvas')")
-            self.assertEqual([], self.violations())
+        chart = "?device=Battery:/system/board/vbat&device=12 V:/system/board/12v"
+        for scheme, width in (("light", 1280), ("dark", 375)):
+            with self.subTest(scheme=scheme, width=width):
+                self.look(width, 900, scheme)
+                self.open(self.server)
+                self.assertEqual([], self.violations())
+                self.open(self.server, chart)
+                self.wait_for("document.querySelector('#plot canvas')")
+                self.assertEqual([], self.violations())
 
     def test_has_no_violation_without_scripts(self):
         # Scripts of the page stay off, as the module is missing; axe itself needs them.
@@ -60,7 +59,7 @@ class AccessibilityTest(PageTest):
         self.wait_for(f"{labels} !== arguments[0]", 3, whole)
         self.press(Keys.ESCAPE)
         self.assertTrue(self.run_script("document.querySelector('#chart').hidden"))
-        self.assertEqual("CPU 2 DIMM D1 Temp", self.focused())
+        self.assertTrue(self.run_script("document.activeElement.matches('#troubles button')"))
 
     def test_keeps_the_focus_when_a_trouble_ends(self):
         self.open(self.server)

@@ -51,6 +51,7 @@ class ChartTest(PageTest):
         self.wait_for(f"{LEGEND}.length === 2")
         self.driver.find_element("css selector", "#compared li:first-child button").click()
         self.assertEqual(["CPU 1 Package Temp"], self.run_script(LEGEND))
+        self.assertEqual("CPU 1 Package Temp", self.focused())
 
     def test_zooms_by_the_pointer_and_back_by_the_button(self):
         self.open_chart("?device=" + CPU2)

@@ -21,6 +21,11 @@ class LiveTest(PageTest):
         return self.run_script("[...document.querySelectorAll('#troubles .sensor button')]"
                                ".map(each => each.textContent)")
 
+    def trouble_text(self, label):
+        return self.wait_for("[...document.querySelectorAll('#troubles .sensor')].find("
+                             "row => row.textContent.includes(arguments[0]) && "
+                             "row.querySelector('.since').textContent)?.innerText", 3, label)
+
     def test_shows_a_crossed_limit_within_three_seconds(self):
         self.assertNotIn("System Fan 1", self.trouble_labels())
         self.machine.set_reading(FAN, 450)
@@ -48,13 +53,18 @@ class LiveTest(PageTest):
         self.wait_for("document.querySelector('#counts [data-urgency=lost]')"
                       ".dataset.number === '4'", 3)
         self.assertRegex(self.row_text("PSU 1 Fan"), r"(?s)–.*Gone")
-        self.assertRegex(self.run_script(
-            "[...document.querySelectorAll('#troubles .sensor')]"
-            ".find(row => row.textContent.includes('PSU 1 Fan')).innerText"), r"since \d")
+        self.assertRegex(self.trouble_text("PSU 1 Fan"), r"Gone since \d")
         self.machine.add(removed)
         self.wait_for("document.querySelector('#counts [data-urgency=lost]')"
                       ".dataset.number === '1'", 3)
         self.assertIn("7936\u00a0RPM", self.row_text("PSU 1 Fan"))
+
+    def test_says_since_when_sensors_are_in_trouble(self):
+        self.server.past = lambda node, age: 50 if age > 600 and "cpu2/package" in node["path"] \
+            else node.get("reading")
+        self.open(self.server)
+        self.assertRegex(self.trouble_text("CPU 2 Package Temp"), r"Warning high since \d")
+        self.assertRegex(self.trouble_text("Battery"), r"Warning low since before \d")
 
     def test_adds_a_new_chip_at_its_place(self):
         self.machine.add([{"type": "temperature", "path": "/system/cpu10/t", "baseUnits": 2,
