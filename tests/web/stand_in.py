@@ -44,7 +44,7 @@ def sensor_of(node):
     """Returns the object of `/api/sensors` for a node."""
     kind, unit = KINDS[node["type"]]
     label = node["description"]
-    return {"chip": node["path"].strip("/").rsplit("/", 1)[0], "device": node.get("device"),
+    return {"chip": node["path"].removeprefix("/hwmon").strip("/").rsplit("/", 1)[0], "device": node.get("device"),
             "label": label, "kind": kind, "value": node.get("reading"), "unit": unit,
             "state": STATES[node["status"]],
             "limits": {LIMITS[name]: node[name] for name in LIMITS if name in node},
