@@ -41,6 +41,7 @@ export class Chart {
     #dygraph = null;
     #underlay = null;
     #shown = '';
+    #arguments = []; // of the last call of show()
 
     /** Calls `onPoint` with the row of the history that the pointer is at; with null for none. */
     constructor(element, onPoint) {
@@ -53,6 +54,7 @@ export class Chart {
      * Needs dygraphs.
      */
     show(history, sensor) {
+        this.#arguments = [history, sensor];
         this.#underlay = { sensor, runsOfSensors: history.sensors.map(
             (each) => stateRunsOf(each, history)) };
         const labels = ['time', ...history.sensors.map((_, index) => `${index}`)];
@@ -68,7 +70,14 @@ export class Chart {
             ...this.#fixedOptions(history), labels, valueRange: options.valueRange });
     }
 
-    /** Removes the chart, so that the next one takes the panel's size and colors anew. */
+    /** Draws the chart anew, with the present colors of the style sheet. */
+    redraw() {
+        if (!this.#dygraph)
+            return;
+        this.remove();
+        this.show(...this.#arguments);
+    }
+
     remove() {
         this.#dygraph?.destroy();
         this.#dygraph = null;

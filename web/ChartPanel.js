@@ -37,10 +37,8 @@ export class ChartPanel {
         });
         this.comparison.addEventListener('change', () =>
             this.#set([...this.devices, this.comparison.value]));
-        matchMedia('(prefers-color-scheme: dark)').addEventListener('change', () => {
-            this.chart.remove();
-            this.show();
-        });
+        matchMedia('(prefers-color-scheme: dark)').addEventListener('change',
+            () => this.chart.redraw());
     }
 
     /** Shows the sensors in the address of which the machine has, or had, one. */

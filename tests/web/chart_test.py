@@ -15,6 +15,22 @@ LEGEND = "[...document.querySelectorAll('#compared bdi:not(.chip-name)')].map(ea
 AXIS = ("[...document.querySelectorAll('#plot .dygraph-axis-label-x')]"
         ".map(each => each.textContent).filter(text => text)")
 
+# Whether the chart has a point of the color of that name.
+DRAWS = """(() => {
+    const probe = document.createElement('span');
+    probe.style.color = `var(${arguments[0]})`;
+    document.body.append(probe);
+    const wanted = getComputedStyle(probe).color.match(/\\d+/g).map(Number);
+    probe.remove();
+    return [...document.querySelectorAll('#plot canvas')].some((canvas) => {
+        const {data} = canvas.getContext('2d').getImageData(0, 0, canvas.width, canvas.height);
+        for (let i = 0; i < data.length; i += 4)
+            if (data[i + 3] === 255 && wanted.every((part, j) => data[i + j] === part))
+                return true;
+        return false;
+    });
+})()"""
+
 
 class ChartTest(PageTest):
     def setUp(self):
@@ -86,6 +102,12 @@ class ChartTest(PageTest):
         self.driver.back()
         self.wait_for("document.querySelector('#plot canvas')?.clientWidth > 900")
 
+    def test_follows_the_color_scheme(self):
+        self.open_chart("?device=" + CPU2)
+        self.wait_for(DRAWS, 5, "--critical")
+        self.look(scheme="dark")
+        self.wait_for(DRAWS, 5, "--critical")
+
     def test_lists_the_states_in_words(self):
         self.open_chart("?device=" + CPU2)
         self.driver.find_element("css selector", "#chart summary").click()
@@ -98,15 +120,7 @@ class ChartTest(PageTest):
         self.open_chart("?device=" + CPU2)
         for name in ("--critical", "--warning-band"):
             with self.subTest(name):
-                self.assertTrue(self.wait_for(
-                    "(() => { const probe = document.createElement('span');"
-                    "probe.style.color = `var(${arguments[0]})`; document.body.append(probe);"
-                    "const wanted = getComputedStyle(probe).color.match(/\\d+/g).map(Number);"
-                    "probe.remove(); return [...document.querySelectorAll('#plot canvas')]"
-                    ".some(canvas => { const {data} = canvas.getContext('2d').getImageData("
-                    "0, 0, canvas.width, canvas.height); for (let i = 0; i < data.length; i += 4)"
-                    " if (wanted.every((part, j) => data[i + j] === part) && data[i + 3] === 255)"
-                    " return true; return false; }); })()", 5, name))
+                self.wait_for(DRAWS, 5, name)
 
     def test_says_where_longer_histories_are(self):
         self.open_chart("?device=" + CPU2)
