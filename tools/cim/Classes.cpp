@@ -10,11 +10,16 @@
 
 namespace Tools {
 
-std::unique_ptr<const Host::Repository> compileClasses()
+std::filesystem::path installedFolder()
 {
     const auto here = std::filesystem::read_symlink("/proc/self/exe").parent_path();
+    return (here / "../share/sensor-profile").lexically_normal();
+}
+
+std::unique_ptr<const Host::Repository> compileClasses()
+{
     Host::Compiler compiler;
-    compiler.compileFile((here / "../share/sensor-profile/host.mof").lexically_normal(), nameSpace);
+    compiler.compileFile(installedFolder() / "host.mof", nameSpace);
     return std::move(compiler).finish();
 }
 

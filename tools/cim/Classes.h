@@ -6,13 +6,17 @@
 
 #include "host/repository/Repository.h"
 
+#include <filesystem>
 #include <memory>
 
 namespace Tools {
 
-// Compiles the MOF files that are installed with the tool, in ../share/sensor-profile relative to
-// its executable. Throws std::runtime_error with the file, and the place in it, when they are
-// missing or cannot be compiled.
+// Returns the folder of the files that are installed with the tool, ../share/sensor-profile
+// relative to its executable.
+std::filesystem::path installedFolder();
+
+// Compiles the MOF files in that folder. Throws std::runtime_error with the file, and the place in
+// it, when they are missing or cannot be compiled.
 std::unique_ptr<const Host::Repository> compileClasses();
 
 } // namespace Tools

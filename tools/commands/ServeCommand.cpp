@@ -15,6 +15,7 @@
 #include "tools/metrics/MetricsResource.h"
 #include "tools/metrics/RequestCounts.h"
 #include "tools/output/Output.h"
+#include "tools/page/PageService.h"
 #include "tools/serve/FreedMemory.h"
 #include "tools/serve/Greeting.h"
 #include "tools/serve/MemoryReturn.h"
@@ -181,13 +182,17 @@ public:
             requireReadable(file);
 
         const std::string text = greeting(sockets, protection.passwords() != nullptr);
+        PageService page(harvests, options_.history, installedFolder() / "web");
+        Host::Http::Resources resources{{"/metrics", metrics}};
+        page.addTo(resources);
         Host::Http::Server server(operations, std::move(sockets), options_.http,
-            protection.certificate(), protection.passwords(), {{"/metrics", metrics}}, &responses);
+            protection.certificate(), protection.passwords(), std::move(resources), &responses);
         out.write(text);
         out.flush();
         notifyServiceManager("READY=1");
         if (serve(server, protection, signals, options_.gracePeriod))
             return ExitCode::success;
+        page.finish();
         complain("requests were still running at the end of the grace period");
         // The destructor of the server would wait for the requests that still run.
         ::_exit(static_cast<int>(ExitCode::failure));

@@ -8,15 +8,11 @@
 
 #include <malloc.h>
 
-#include <cstddef>
 #include <utility>
 
 namespace Tools {
 
 namespace {
-
-// In the texts that clients have yet to fetch. Of 10,000 sensors, three fit.
-constexpr std::size_t maximumUnsentBytes = std::size_t{64} << 20;
 
 ExpositionForm preferredForm(const Host::Http::RequestHead& head)
 {
@@ -33,12 +29,6 @@ const char* contentTypeOf(ExpositionForm form)
                : "application/openmetrics-text; version=1.0.0; charset=utf-8";
 }
 
-Host::Http::HttpError tooMuchText()
-{
-    return Host::Http::HttpError::closing(
-        503, "clients have yet to fetch too much text", {{"Retry-After", "1"}});
-}
-
 } // namespace
 
 MetricsResource::MetricsResource(
@@ -53,13 +43,13 @@ Host::Http::Representation MetricsResource::represent(const Host::Http::RequestH
 {
     const ExpositionForm form = preferredForm(head);
     const auto text = (form == ExpositionForm::text ? text_ : openMetrics_).get();
-    return {{{"Content-Type", contentTypeOf(form)}, {"Vary", "Accept"}}, {text, &text->content}};
+    return representationOf(text, {{"Content-Type", contentTypeOf(form)}, {"Vary", "Accept"}});
 }
 
-std::shared_ptr<const MetricsResource::Text> MetricsResource::write(ExpositionForm form)
+std::shared_ptr<const UnsentText> MetricsResource::write(ExpositionForm form)
 {
     if (!unsent_.hasRoomFor(latestSize_)) // before the sensors are read in vain
-        throw tooMuchText();
+        throw tooMuchUnsentText();
     Exposition exposition(form, latestSize_ + latestSize_ / 64);
     auto harvest = harvests_.get();
     const std::size_t sensors = harvest->sensors.size();
@@ -68,13 +58,9 @@ std::shared_ptr<const MetricsResource::Text> MetricsResource::write(ExpositionFo
     if (sensors >= largeAnswer)
         ::malloc_trim(0);
     addMore_(exposition);
-    auto text = std::make_shared<Text>();
-    text->content = std::move(exposition).finish();
-    latestSize_ = text->content.size();
-    text->share = unsent_.hold(text->content.size());
-    if (!text->share)
-        throw tooMuchText();
-    return text;
+    std::string text = std::move(exposition).finish();
+    latestSize_ = text.size();
+    return std::make_shared<const UnsentText>(std::move(text), unsent_);
 }
 
 } // namespace Tools

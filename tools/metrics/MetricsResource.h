@@ -7,11 +7,11 @@
 #include "tools/metrics/Exposition.h"
 #include "tools/sensors/Harvest.h"
 #include "tools/serve/SingleFlight.h"
+#include "tools/serve/UnsentText.h"
 
 #include <atomic>
 #include <cstddef>
 #include <functional>
-#include <string>
 
 namespace Tools {
 
@@ -27,19 +27,14 @@ public:
     Host::Http::Representation represent(const Host::Http::RequestHead& head) override;
 
 private:
-    struct Text {
-        std::string content;
-        Host::Http::UnsentObjects::Share share; // counts the bytes
-    };
-
-    std::shared_ptr<const Text> write(ExpositionForm form);
+    std::shared_ptr<const UnsentText> write(ExpositionForm form);
 
     SingleFlight<Harvest>& harvests_;
     const std::function<void(Exposition&)> addMore_;
     Host::Http::UnsentObjects unsent_;
     std::atomic<std::size_t> latestSize_ = 0; // of a text, in bytes
-    SingleFlight<Text> text_;
-    SingleFlight<Text> openMetrics_;
+    SingleFlight<UnsentText> text_;
+    SingleFlight<UnsentText> openMetrics_;
 };
 
 } // namespace Tools

@@ -18,7 +18,9 @@ void appendMember(std::string& json, const char* name, std::string_view text)
         appendString(json, text);
 }
 
-void appendSensor(std::string& json, const Sensor& sensor)
+} // namespace
+
+void appendSensorJson(std::string& json, const Sensor& sensor)
 {
     json += "{\"chip\": ";
     appendString(json, sensor.chip);
@@ -41,14 +43,12 @@ void appendSensor(std::string& json, const Sensor& sensor)
     json += '}';
 }
 
-} // namespace
-
 void writeSensorJson(Output& out, const Sensors& sensors)
 {
     out.write("[");
     std::string json = "\n  ";
     for (const Sensor& sensor : sensors) {
-        appendSensor(json, sensor);
+        appendSensorJson(json, sensor);
         out.write(json);
         json = ",\n  ";
     }

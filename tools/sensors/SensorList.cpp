@@ -15,13 +15,21 @@ namespace Tools {
 namespace {
 
 // Sorts pointers, since a sensor is large.
-void sort(Sensors& sensors)
+template <typename Each, typename All>
+std::vector<Each*> listOrderOf(All& sensors)
 {
-    std::vector<Sensor*> order;
-    for (Sensor& sensor : sensors)
+    std::vector<Each*> order;
+    order.reserve(sensors.size());
+    for (Each& sensor : sensors)
         order.push_back(&sensor);
     std::sort(order.begin(), order.end(),
         [](const Sensor* first, const Sensor* second) { return isListedBefore(*first, *second); });
+    return order;
+}
+
+void sort(Sensors& sensors)
+{
+    const auto order = listOrderOf<Sensor>(sensors);
     Sensors sorted;
     sorted.reserve(order.size());
     for (Sensor* const sensor : order)
@@ -59,6 +67,11 @@ bool isListedBefore(const Sensor& first, const Sensor& second)
             if (const auto comparison = compareNaturally(*left, *right); comparison != 0)
                 return comparison < 0;
     return first.deviceId < second.deviceId;
+}
+
+std::vector<const Sensor*> inListOrder(const Sensors& sensors)
+{
+    return listOrderOf<const Sensor>(sensors);
 }
 
 Sensors readSensors(ProviderClient& provider, bool isWhole)

@@ -19,6 +19,9 @@ using Sensors = std::vector<Sensor>;
 // Returns whether a sensor comes before another one in a list.
 bool isListedBefore(const Sensor& first, const Sensor& second);
 
+// Returns the sensors in the order of a list. They belong to the argument.
+std::vector<const Sensor*> inListOrder(const Sensors& sensors);
+
 // Returns the properties of which a Sensor is made, with a null at the end.
 std::vector<const char*> propertiesOfSensors();
 

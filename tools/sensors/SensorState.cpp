@@ -12,7 +12,7 @@ namespace {
 constexpr unsigned none = 0;
 
 // The values of CurrentState, and the codes of OperationalStatus for which there is none (the value
-// maps of CIM_ManagedSystemElement).
+// maps of CIM_ManagedSystemElement). As their order numbers the states, rows are added at the end.
 struct StateRow {
     std::string_view currentState;
     unsigned operationalStatus;
@@ -36,8 +36,25 @@ constexpr std::array stateRows = {
     StateRow{"", 13, {"Lost", Urgency::lost}},
     StateRow{"", 15, {"Dormant", Urgency::inactive}},
 };
+constexpr unsigned numberOfUnknown = 1;
+static_assert(stateRows.size() + numberOfUnknown == greatestStateNumber);
 
 } // namespace
+
+unsigned numberOf(const SensorState& state)
+{
+    const auto row = std::find_if(stateRows.begin(), stateRows.end(),
+        [&](const StateRow& each) { return each.state.word == state.word; });
+    return row == stateRows.end()
+               ? numberOfUnknown
+               : static_cast<unsigned>(row - stateRows.begin()) + numberOfUnknown + 1;
+}
+
+SensorState stateNumbered(unsigned number)
+{
+    return number == numberOfUnknown ? SensorState{}
+                                     : stateRows.at(number - numberOfUnknown - 1).state;
+}
 
 SensorState stateOf(std::string_view currentState, std::span<const unsigned> statuses)
 {

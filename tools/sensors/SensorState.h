@@ -26,6 +26,12 @@ inline constexpr SensorState noContactState = {"No contact", Urgency::inactive};
 // of OperationalStatus. Returns the state "Unknown" for all others.
 SensorState stateOf(std::string_view currentState, std::span<const unsigned> statuses);
 
+// The numbers by which states are stored, from 1 to this one. They never change.
+inline constexpr unsigned greatestStateNumber = 17;
+unsigned numberOf(const SensorState& state);
+// REQUIRES: the number is that of a state.
+SensorState stateNumbered(unsigned number);
+
 // Returns the word for that CurrentState; nothing where no sensor has it.
 std::optional<std::string_view> wordOfState(std::string_view currentState);
 

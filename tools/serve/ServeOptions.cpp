@@ -9,8 +9,10 @@
 #include <CLI/CLI.hpp>
 
 #include <cstdint>
+#include <cstdlib>
 #include <functional>
 #include <memory>
+#include <string_view>
 #include <vector>
 
 namespace Tools {
@@ -132,6 +134,8 @@ void ServeOptions::addTo(CLI::App& parser)
     addFile(parser, "--passwords", passwords, "Users who may sign in (default: everybody may ask)");
     parser.add_option("--user", user, "Serve as this user, when started by root")
         ->type_name("NAME");
+    parser.add_option("--history", history, "Keep the last day's readings in this folder, or off")
+        ->type_name("FOLDER");
     addCompatible(parser, compatible);
     addFile(parser, "--config", configuration, "Read options from this file, too");
     parser.add_flag("--check", isCheck, "Check the options and their files, and exit");
@@ -147,6 +151,10 @@ void ServeOptions::complete(CLI::App& parser)
     if (certificate.has_value() != key.has_value())
         throw UsageError(certificate ? "--certificate needs the private key: --key is missing"
                                      : "--key needs its certificate: --certificate is missing");
+    const char* const stateFolders = std::getenv("STATE_DIRECTORY"); // systemd.exec(5)
+    if (!history && stateFolders != nullptr && *stateFolders != '\0')
+        history =
+            std::string_view(stateFolders).substr(0, std::string_view(stateFolders).find(':'));
     listen.hasCertificate = certificate.has_value();
     listen.hasPasswords = passwords.has_value();
 }

@@ -1,0 +1,173 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "tools/history/HistoryFile.h"
+
+#include "tools/output/FileReplacement.h"
+
+#include <fcntl.h>
+#include <unistd.h>
+#include <zlib.h>
+
+#include <array>
+#include <cerrno>
+#include <cstdint>
+#include <stdexcept>
+#include <system_error>
+#include <type_traits>
+#include <utility>
+
+namespace Tools {
+
+namespace {
+
+// Numbers are in the byte order of the machine, to which the file belongs.
+struct Header {
+    std::array<char, 8> magic = {'s', 'e', 'n', 's', 'o', 'r', 's', '1'};
+    std::uint32_t sizeOfSamples = sizeof(Samples);
+    std::uint32_t count = 0; // of the sensors that follow
+    Slot newest = 0;
+};
+struct SensorHeader {
+    Slot lastSeen = 0;
+    std::uint64_t sizeOfDeviceId = 0;
+};
+static_assert(std::has_unique_object_representations_v<Header> &&
+              std::has_unique_object_representations_v<SensorHeader>);
+
+constexpr std::uint64_t maximumDeviceId = 4096; // longer ones are not stored
+constexpr Slot greatestSlot = Slot{1} << 40;
+constexpr ::mode_t modeOfFile = 0600;
+
+void require(bool condition, const char* otherwise)
+{
+    if (!condition)
+        throw std::runtime_error(otherwise);
+}
+
+class Gzip {
+public:
+    // Reads or writes at a descriptor, which stays open.
+    Gzip(int descriptor, const char* mode) : file_(::gzdopen(::dup(descriptor), mode))
+    {
+        if (file_ == nullptr)
+            throw std::system_error(errno, std::generic_category());
+    }
+    ~Gzip()
+    {
+        if (file_ != nullptr)
+            ::gzclose(file_);
+    }
+    Gzip(const Gzip&) = delete;
+    Gzip& operator=(const Gzip&) = delete;
+
+    void write(const void* bytes, std::size_t count)
+    {
+        if (::gzwrite(file_, bytes, static_cast<unsigned>(count)) == 0)
+            throw std::system_error(errno, std::generic_category());
+    }
+    // Writes the checksum.
+    void finish()
+    {
+        if (::gzclose(std::exchange(file_, nullptr)) != Z_OK)
+            throw std::system_error(errno, std::generic_category());
+    }
+
+    bool read(void* bytes, std::size_t count)
+    {
+        return ::gzread(file_, bytes, static_cast<unsigned>(count)) == static_cast<int>(count);
+    }
+    // Returns whether all was read and has the right checksum.
+    bool isAtEnd()
+    {
+        char next = 0;
+        return ::gzread(file_, &next, 1) == 0 && ::gzdirect(file_) == 0;
+    }
+
+private:
+    ::gzFile file_;
+};
+
+} // namespace
+
+void storeHistory(const SensorHistory& history,
+    const std::function<void(const void* bytes, std::size_t count)>& write)
+{
+    // A sensor that is forgotten meanwhile is stored without samples.
+    auto deviceIds = history.deviceIds();
+    std::erase_if(
+        deviceIds, [](const auto& each) { return each.empty() || each.size() > maximumDeviceId; });
+    Header header;
+    header.count = static_cast<std::uint32_t>(deviceIds.size());
+    header.newest = history.newest();
+    write(&header, sizeof header);
+    for (const std::string& deviceId : deviceIds) {
+        const auto entry =
+            history.entryUntil(deviceId, header.newest).value_or(SensorHistory::Entry{});
+        const SensorHeader sensor{entry.lastSeen, deviceId.size()};
+        write(&sensor, sizeof sensor);
+        write(deviceId.data(), deviceId.size());
+        write(&entry.samples, sizeof entry.samples);
+    }
+}
+
+StoredHistory parseHistory(const std::function<bool(void* bytes, std::size_t count)>& read)
+{
+    constexpr const char* truncated = "it is truncated";
+    Header header;
+    require(read(&header, sizeof header), truncated);
+    require(header.magic == Header().magic && header.sizeOfSamples == sizeof(Samples),
+        "it is of another version");
+    require(header.count <= SensorHistory::maximumSensors, "it has too many sensors");
+    require(header.newest >= 0 && header.newest <= greatestSlot, "it has an impossible time");
+    SensorHistory::Entries entries;
+    for (std::uint32_t i = 0; i < header.count; ++i) {
+        SensorHeader sensor;
+        require(read(&sensor, sizeof sensor), truncated);
+        require(sensor.lastSeen >= 0 && sensor.lastSeen <= header.newest,
+            "a sensor has an impossible time");
+        require(sensor.sizeOfDeviceId > 0 && sensor.sizeOfDeviceId <= maximumDeviceId,
+            "a sensor has an impossible name");
+        std::string deviceId(sensor.sizeOfDeviceId, '\0');
+        auto entry = std::make_unique<SensorHistory::Entry>();
+        require(
+            read(deviceId.data(), deviceId.size()) && read(&entry->samples, sizeof entry->samples),
+            truncated);
+        require(entry->samples.isValid(), "a sensor has an impossible state");
+        entry->lastSeen = sensor.lastSeen;
+        require(
+            entries.emplace(std::move(deviceId), std::move(entry)).second, "it has a sensor twice");
+    }
+    return {std::move(entries), header.newest};
+}
+
+void writeHistoryFile(const std::string& file, const SensorHistory& history)
+{
+    const auto write = [&](int descriptor) {
+        Gzip gzip(descriptor, "wb1"); // fast: higher levels save little
+        storeHistory(
+            history, [&](const void* bytes, std::size_t count) { gzip.write(bytes, count); });
+        gzip.finish();
+    };
+    replaceFile(file, write, modeOfFile);
+}
+
+void readHistoryFile(const std::string& file, SensorHistory& history)
+{
+    const int descriptor = ::open(file.c_str(), O_RDONLY | O_CLOEXEC);
+    if (descriptor == -1 && errno == ENOENT)
+        return;
+    if (descriptor == -1)
+        throw std::runtime_error(file + ": " + std::generic_category().message(errno));
+    try {
+        Gzip gzip(descriptor, "rb");
+        ::close(descriptor);
+        auto [entries, newest] =
+            parseHistory([&](void* bytes, std::size_t count) { return gzip.read(bytes, count); });
+        require(gzip.isAtEnd(), "its checksum is wrong");
+        history.restore(std::move(entries), newest);
+    } catch (const std::runtime_error& error) {
+        throw std::runtime_error(file + ": " + error.what());
+    }
+}
+
+} // namespace Tools

@@ -1,0 +1,74 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#pragma once
+
+#include "tools/sensors/Sensor.h"
+
+#include <array>
+#include <cstddef>
+#include <cstdint>
+#include <limits>
+
+namespace Tools {
+
+// Times in units of ten seconds and of minutes since 1970. A sample belongs to the unit of the wall
+// clock in which it was taken.
+using Slot = std::int64_t;
+inline constexpr int secondsOfSlot = 10;
+inline constexpr int slotsOfMinute = 6;
+constexpr Slot minuteOf(Slot slot)
+{
+    return slot / slotsOfMinute;
+}
+
+// Returns the more urgent of two states by their numbers, the later one of equally urgent ones. The
+// number 0 is that of nothing recorded, which is the least urgent.
+unsigned moreUrgent(unsigned earlier, unsigned later);
+
+// The readings and states of one sensor. Has a fixed size, and is written to files as it is.
+class Samples {
+public:
+    static constexpr Slot slotsKept = 360;
+    static constexpr Slot minutesKept = 1440;
+    static constexpr float absent = std::numeric_limits<float>::quiet_NaN();
+
+    // A reading is NaN where the sensor had none; a state is its number, 0 where nothing was
+    // recorded.
+    struct OfSlot {
+        float value = absent;
+        std::uint8_t state = 0;
+    };
+    struct OfMinute {
+        float minimum = absent;
+        float mean = absent;
+        float maximum = absent;
+        std::uint8_t state = 0; // the most urgent one
+    };
+
+    Samples();
+
+    // Adds a sample to the slot and to its minute, the newest ones.
+    void add(Slot slot, const Sensor& sensor);
+    // Have nothing recorded there.
+    void clearSlot(Slot slot);
+    void clearMinute(Slot minute);
+
+    // REQUIRES: the slot or minute is among the last ones that are kept.
+    OfSlot ofSlot(Slot slot) const;
+    OfMinute ofMinute(Slot minute) const;
+
+    // Returns whether add() can have made it.
+    bool isValid() const;
+
+private:
+    // Arrays apart, since a structure would have three unused bytes for each sample.
+    std::array<float, slotsKept> values_;
+    std::array<float, minutesKept> minima_;
+    std::array<float, minutesKept> means_;
+    std::array<float, minutesKept> maxima_;
+    std::array<std::uint8_t, slotsKept> states_;
+    std::array<std::uint8_t, minutesKept> statesOfMinutes_;
+    std::uint32_t readingsOfMinute_ = 0; // in the newest one
+};
+
+} // namespace Tools

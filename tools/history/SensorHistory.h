@@ -1,0 +1,78 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#pragma once
+
+#include "tools/history/Samples.h"
+
+#include <chrono>
+#include <map>
+#include <memory>
+#include <optional>
+#include <shared_mutex>
+#include <string>
+#include <vector>
+
+namespace Tools {
+
+// The last hour and day of the sensors, in a memory of 21 KiB for each. Thread-safe.
+//
+// Where the clock is set forward, and where the machine was suspended, nothing is recorded of the
+// time between. Where it is set back, what was recorded of later times is discarded.
+class SensorHistory {
+public:
+    // Of further sensors nothing is recorded.
+    static constexpr std::size_t maximumSensors = 10'000;
+
+    static Slot slotOf(std::chrono::system_clock::time_point time);
+
+    // Records the sensors, which are in the order of a list. Forgets those that were not among them
+    // for a day.
+    void add(const std::vector<const Sensor*>& sensors, std::chrono::system_clock::time_point now);
+
+    // The last slot of which samples were recorded; 0 where there are none.
+    Slot newest() const;
+
+    // Calls a function with the samples of the sensor and newest(). Returns false where there are
+    // no such samples. The function must not call this object.
+    template <typename Visitor>
+    bool visit(const std::string& deviceId, const Visitor& visitor) const
+    {
+        const std::shared_lock lock(mutex_);
+        const auto found = entries_.find(deviceId);
+        if (found == entries_.end())
+            return false;
+        visitor(found->second->samples, newest_);
+        return true;
+    }
+    // Calls a function with the identifier and the samples of each sensor that was among the last
+    // ones, in the order of a list, and with newest().
+    template <typename Visitor>
+    void visitPresent(const Visitor& visitor) const
+    {
+        const std::shared_lock lock(mutex_);
+        for (const auto& each : present_)
+            visitor(each->first, each->second->samples, newest_);
+    }
+
+    // What is stored of a sensor.
+    struct Entry {
+        Slot lastSeen = 0;
+        Samples samples;
+    };
+    std::vector<std::string> deviceIds() const;
+    // Returns what add() had recorded of the sensor until that slot.
+    std::optional<Entry> entryUntil(const std::string& deviceId, Slot slot) const;
+    using Entries = std::map<std::string, std::unique_ptr<Entry>>;
+    // Replaces everything by what was stored.
+    void restore(Entries entries, Slot newest);
+
+private:
+    void advanceTo(Slot slot);
+
+    mutable std::shared_mutex mutex_;
+    Entries entries_;
+    std::vector<Entries::const_iterator> present_;
+    Slot newest_ = 0;
+};
+
+} // namespace Tools

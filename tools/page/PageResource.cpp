@@ -1,0 +1,160 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "tools/page/PageResource.h"
+
+#include "host/http/ResourceCheck.h"
+#include "platform/utilities/ProviderUtilities.h"
+#include "tools/page/WebFiles.h"
+
+#include <kainjow/mustache.hpp>
+#include <nlohmann/json.hpp>
+
+#include <array>
+#include <stdexcept>
+#include <string_view>
+#include <utility>
+
+namespace Tools {
+
+namespace {
+
+using Data = kainjow::mustache::data;
+using Texts = nlohmann::json; // by name
+
+constexpr const char* defaultLanguage = "en";
+
+constexpr std::array urgencies = {Urgency::critical, Urgency::warning, Urgency::lost,
+    Urgency::unknown, Urgency::inactive, Urgency::normal};
+
+// Returns the text of that name; the name where there is none.
+std::string textIn(const Texts& texts, std::string_view name)
+{
+    const auto found = texts.find(name);
+    return found != texts.end() && found->is_string() ? found->get<std::string>()
+                                                      : std::string(name);
+}
+
+Data rowOf(const Sensor& sensor, const Texts& texts)
+{
+    constexpr const char* noReading = "\u2013";
+    std::string limits;
+    for (std::size_t i = 0; i < limitKinds.size(); ++i)
+        if (const auto& limit = sensor.limits.at(i))
+            limits += (limits.empty() ? "" : ", ") +
+                      textIn(texts.at("limitNames"), limitKinds.at(i).member) + " " + limit->text();
+    Data row;
+    row.set("label", sensor.label);
+    row.set("reading",
+        sensor.reading ? sensor.reading->rounded() + " " + std::string(sensor.unit) : noReading);
+    row.set("state", textIn(texts.at("states"), sensor.state.word));
+    row.set("urgency", std::string(wordOf(sensor.state.urgency)));
+    row.set("limits", limits);
+    return row;
+}
+
+Data chipsOf(const std::vector<const Sensor*>& sensors, const Texts& texts)
+{
+    Data chips(Data::type::list);
+    for (auto first = sensors.begin(); first != sensors.end();) {
+        Data rows(Data::type::list);
+        auto next = first;
+        for (; next != sensors.end() && (*next)->chip == (*first)->chip; ++next)
+            rows.push_back(rowOf(**next, texts));
+        Data chip;
+        chip.set("chip", (*first)->chip);
+        chip.set("device", (*first)->device);
+        chip.set("sensors", std::move(rows));
+        chips.push_back(std::move(chip));
+        first = next;
+    }
+    return chips;
+}
+
+Data countsOf(const Sensors& sensors, const Texts& texts)
+{
+    std::map<Urgency, std::size_t> counts;
+    for (const Sensor& sensor : sensors)
+        ++counts[sensor.state.urgency];
+    Data list(Data::type::list);
+    for (const Urgency urgency : urgencies) {
+        const std::string word(wordOf(urgency));
+        Data count;
+        count.set("urgency", word);
+        count.set("number", std::to_string(counts[urgency]));
+        count.set("word", textIn(texts.at("urgencies"), word));
+        list.push_back(std::move(count));
+    }
+    return list;
+}
+
+Data textsOf(const Texts& texts)
+{
+    Data result;
+    for (const auto& [name, text] : texts.items())
+        if (text.is_string())
+            result.set(name, text.get<std::string>());
+    return result;
+}
+
+std::string render(const std::string& text, const std::string& language, const Texts& texts,
+    const Sensors& sensors)
+{
+    Data data;
+    data.set("language", language);
+    data.set("machine", Vorn::getSystemName());
+    data.set("text", textsOf(texts));
+    data.set("counts", countsOf(sensors, texts));
+    data.set("chips", chipsOf(inListOrder(sensors), texts));
+    return kainjow::mustache::mustache(text).render(data); // whose method is not const
+}
+
+Texts parseTexts(const std::string& name, const std::string& content)
+{
+    try {
+        Texts texts = Texts::parse(content);
+        for (const char* const member : {"limitNames", "states", "urgencies"})
+            (void)texts.at(member);
+        return texts;
+    } catch (const Texts::exception& error) {
+        throw std::runtime_error(name + ": " + error.what());
+    }
+}
+
+} // namespace
+
+PageResource::PageResource(
+    const WebFiles& files, SingleFlight<Harvest>& harvests, Host::Http::UnsentObjects& unsent)
+    : template_(files.contentOf("page.html"))
+{
+    const kainjow::mustache::mustache parsed(template_);
+    if (!parsed.is_valid())
+        throw std::runtime_error("page.html: " + parsed.error_message());
+    for (const std::string& name : files.namesIn("languages")) {
+        const std::string language = std::filesystem::path(name).stem();
+        const auto write = [this, &harvests, &unsent, language,
+                               texts = parseTexts(name, files.contentOf(name))] {
+            return std::make_shared<const UnsentText>(
+                render(template_, language, texts, harvests.get()->sensors), unsent);
+        };
+        pages_.emplace(language, std::make_unique<SingleFlight<UnsentText>>(write));
+    }
+    (void)pages_.at(defaultLanguage);
+}
+
+Host::Http::Representation PageResource::represent(const Host::Http::RequestHead& head)
+{
+    auto preferred = pages_.find(defaultLanguage);
+    double greatest = 0;
+    for (const auto& [range, weight] : Host::Http::weightedElements(head, "Accept-Language")) {
+        const auto found = pages_.find(range.substr(0, range.find('-')));
+        if (found != pages_.end() && weight > greatest) {
+            greatest = weight;
+            preferred = found;
+        }
+    }
+    auto fields = pageFields("text/html; charset=utf-8");
+    fields.push_back({"Vary", "Accept-Language"});
+    return representationOf(preferred->second->get(), std::move(fields));
+}
+
+} // namespace Tools

@@ -1,0 +1,59 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#pragma once
+
+#include "tools/history/HistoryKeeper.h"
+#include "tools/history/SensorHistory.h"
+#include "tools/page/ChangeFeed.h"
+#include "tools/page/HistoryResource.h"
+#include "tools/page/PageResource.h"
+#include "tools/page/Sampler.h"
+#include "tools/page/SensorResources.h"
+#include "tools/page/WebFiles.h"
+
+#include <filesystem>
+#include <optional>
+#include <string>
+
+namespace Tools {
+
+// The page and what it is fed from, as resources of a server.
+class PageService {
+public:
+    // Keeps the history as `history` says: a folder, "off", or nothing for memory only. Without the
+    // files of the page in the folder, the page says so and the rest works. The harvests must
+    // outlive it. Throws std::runtime_error where the history cannot be kept.
+    PageService(SingleFlight<Harvest>& harvests, const std::optional<std::string>& history,
+        const std::filesystem::path& folder);
+
+    // Adds the resources. They belong to this object.
+    void addTo(Host::Http::Resources& resources);
+
+    // Writes the history a last time.
+    void finish() { keeper_.reset(); }
+
+private:
+    // Answers that the page is not there.
+    class AbsentPage : public Host::Http::Resource {
+    public:
+        Host::Http::Representation represent(const Host::Http::RequestHead& head) override;
+
+        std::string reason;
+    };
+
+    void readFiles(SingleFlight<Harvest>& harvests, const std::filesystem::path& folder);
+
+    std::optional<SensorHistory> history_;
+    std::optional<HistoryKeeper> keeper_;
+    Host::Http::UnsentObjects unsent_{maximumUnsentBytes};
+    ChangeFeed feed_;
+    SensorListResource sensors_;
+    HistoryResource histories_;
+    EventsResource events_{feed_};
+    AbsentPage absentPage_;
+    std::optional<WebFiles> files_;
+    std::optional<PageResource> page_;
+    std::optional<Sampler> sampler_; // last: it uses all of the above
+};
+
+} // namespace Tools

@@ -1,0 +1,73 @@
+// Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
+
+#include "tools/page/Sampler.h"
+
+#include "host/http/EventLog.h"
+#include "tools/history/SensorHistory.h"
+#include "tools/page/ChangeFeed.h"
+
+#include <algorithm>
+#include <exception>
+#include <string>
+#include <utility>
+
+namespace Tools {
+
+namespace {
+
+using SteadyClock = std::chrono::steady_clock;
+using SystemClock = std::chrono::system_clock;
+
+} // namespace
+
+Sampler::Sampler(SingleFlight<Harvest>& harvests, ChangeFeed& feed, SensorHistory* history)
+    : harvests_(harvests), feed_(feed), history_(history),
+      thread_([this](const std::stop_token& stop) { run(stop); })
+{
+}
+
+void Sampler::run(const std::stop_token& stop)
+{
+    if (history_ != nullptr)
+        sample();
+    for (;;) {
+        feed_.waitUntil(nextTime(), stop);
+        if (stop.stop_requested())
+            return;
+        sample();
+    }
+}
+
+// Without subscribers and history, the time is one at which nothing is lost by a sample.
+SteadyClock::time_point Sampler::nextTime() const
+{
+    const auto now = SteadyClock::now();
+    auto next = now + std::chrono::hours(24);
+    if (feed_.hasSubscribers())
+        next = sampled_ + livePeriod;
+    if (history_ != nullptr) {
+        constexpr std::chrono::seconds slot{secondsOfSlot};
+        next = std::min(next, now + slot - SystemClock::now().time_since_epoch() % slot);
+    }
+    return next;
+}
+
+void Sampler::sample()
+{
+    try {
+        const auto harvest = harvests_.get();
+        const auto sensors = inListOrder(harvest->sensors);
+        const auto now = SystemClock::now();
+        const Slot slot = SensorHistory::slotOf(now);
+        if (history_ != nullptr && std::exchange(slot_, slot) != slot)
+            history_->add(sensors, now);
+        if (feed_.hasSubscribers())
+            feed_.publish(sensors, SystemClock::to_time_t(now));
+    } catch (const std::exception& error) {
+        Host::Http::report({"sample", "Sampler", __LINE__},
+            std::string("the sensors were not read: ") + error.what());
+    }
+    sampled_ = SteadyClock::now();
+}
+
+} // namespace Tools
