@@ -129,7 +129,7 @@ class ChartTest(PageTest):
     def test_says_when_there_is_no_history(self):
         self.expected_errors = ("/api/history",)
         self.open_chart("?device=" + CPU2)
-        self.server.keeps_history = False
+        self.server.keep_history(False)
         self.driver.find_element("css selector", "[data-span=day]").click()
         self.wait_for("document.querySelector('#plot-summary').textContent"
                       " === 'No history is available.'")
