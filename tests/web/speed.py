@@ -12,7 +12,7 @@ from machine import Machine
 SENSORS = 1000
 CHANGED = 200  # sensors in each period
 PERIOD = 2
-ATTEMPTS = 3  # the machine may be busy with something else during one
+ATTEMPTS = 5  # the machine may be busy with something else during one
 
 
 def processes_below(process):
@@ -38,9 +38,11 @@ class SpeedTest(PageTest):
         self.server = self.serve(self.machine)
 
     def test_is_usable_within_a_second(self):
-        seconds = min(self.seconds_until_usable() for _ in range(ATTEMPTS))
-        print(f"{SENSORS} sensors are usable after {seconds:.2f} s")
-        self.assertLess(seconds, 1)
+        seconds = []
+        while len(seconds) < ATTEMPTS and min(seconds, default=1) >= 1:
+            seconds.append(self.seconds_until_usable())
+        print(f"{SENSORS} sensors are usable after {min(seconds):.2f} s")
+        self.assertLess(min(seconds), 1)
 
     def test_uses_little_of_a_core_while_live(self):
         self.open(self.server)
