@@ -108,7 +108,7 @@ export class ChartPanel {
         if (history) {
             this.chart.show(history, sensors[0]);
             this.legend.setHistory(history);
-            fillStateChanges(document.getElementById('state-changes'), history);
+            fillStateChanges(document.getElementById('state-changes'), history, sensors);
         }
         this.#timer = setTimeout(() => this.#draw(), refreshAfter[span]);
     }

@@ -24,7 +24,7 @@ function drawStates(canvas, area, chart, runsOfSensors) {
             const right = Math.min(chart.toDomXCoord(end), area.x + area.w);
             if (right <= left)
                 continue;
-            canvas.fillStyle = styleValue(`--${urgency}-band`);
+            canvas.fillStyle = styleValue(isStrip ? `--${urgency}` : `--${urgency}-band`);
             const top = area.y + area.h - stripHeight * (runsOfSensors.length - index);
             canvas.fillRect(left, isStrip ? top : area.y, right - left,
                 isStrip ? stripHeight - 1 : area.h);

@@ -19,13 +19,16 @@ export function summaryText(history, sensors) {
     }).join(' ');
 }
 
-/** Fills the list with the states of the first sensor, the latest first. */
-export function fillStateChanges(list, history) {
-    const runs = stateRunsOf(history.sensors[0], history).reverse();
-    list.replaceChildren(...runs.map(({ state, begin, end }) => {
-        const item = document.createElement('li');
-        item.textContent = `${exactTimeText(begin / 1000)} – ${exactTimeText(end / 1000)}: ` +
-            (state === null ? text('nothingRecorded') : stateText(state));
-        return item;
+/** Fills the list with the states of each sensor, the latest first. */
+export function fillStateChanges(list, history, sensors) {
+    list.replaceChildren(...sensors.flatMap((sensor, index) => {
+        const runs = stateRunsOf(history.sensors[index], history).reverse();
+        return runs.map(({ state, begin, end }) => {
+            const item = document.createElement('li');
+            const words = state === null ? text('nothingRecorded') : stateText(state);
+            item.textContent = `${isolated(nameOf(sensor))}: ${words}, ` +
+                `${exactTimeText(begin / 1000)} – ${exactTimeText(end / 1000)}`;
+            return item;
+        });
     }));
 }

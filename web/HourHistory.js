@@ -23,9 +23,9 @@ export class HourHistory {
         const { interval, end, sensors } = await response.json();
         this.#values = new Map(sensors.map(({ deviceId, values }) => [deviceId, values]));
         this.machine.setSince(sensors.map(({ deviceId, states }) => {
-            const [state, count] = states.at(-1);
-            return { deviceId, state, since: end - count * interval,
-                isSinceEarlier: states.length === 1 };
+            const [before, [state, count]] = [[null, 0], [null, 0], ...states].slice(-2);
+            const isSinceEarlier = before[0] === null; // nothing was recorded before
+            return { deviceId, state, since: end - count * interval, isSinceEarlier };
         }));
         clearInterval(this.#timer);
         this.#timer = setInterval(() => this.#continue(), interval * 1000);

@@ -113,7 +113,7 @@ class ChartTest(PageTest):
         self.driver.find_element("css selector", "#chart summary").click()
         states = self.run_script("[...document.querySelectorAll('#state-changes li')]"
                                  ".map(item => item.innerText)")
-        self.assertIn("Warning high", states[0])
+        self.assertRegex(states[0], "CPU 2 Package Temp.*: Warning high, ")
         self.assertTrue(any("Normal" in state for state in states), states)
 
     def test_draws_limits_and_states(self):

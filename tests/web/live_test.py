@@ -66,6 +66,20 @@ class LiveTest(PageTest):
         self.assertRegex(self.trouble_text("CPU 2 Package Temp"), r"Warning high since \d")
         self.assertRegex(self.trouble_text("Battery"), r"Warning low since before \d")
 
+    def test_does_not_take_the_begin_of_the_history_for_that_of_a_state(self):
+        script = ("const [states, done] = arguments;"
+                  "window.fetch = () => Promise.resolve(new Response(JSON.stringify({interval: 10,"
+                  " end: 1000, sensors: [{deviceId: 'a', values: [], states}]})));"
+                  "import('/web/HourHistory.js').then(async ({HourHistory}) => {"
+                  " let result; await new HourHistory({setSince: each => { result = each }}).load();"
+                  " done(result[0]); });")
+        for states, is_earlier in (([], True), ([["Lost", 3]], True), ([[None, 5], ["Lost", 3]], True),
+                                   ([["Normal", 5], ["Lost", 3]], False)):
+            with self.subTest(states):
+                result = self.driver.execute_async_script(script, states)
+                self.assertEqual(is_earlier, result["isSinceEarlier"])
+                self.assertEqual(970 if states else 1000, result["since"])
+
     def test_adds_a_new_chip_at_its_place(self):
         self.machine.add([{"type": "temperature", "path": "/system/cpu10/t", "baseUnits": 2,
                            "description": "CPU 10", "status": 1, "reading": 40}])
