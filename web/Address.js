@@ -3,8 +3,8 @@
 // What the page shows, as a part of its address, so that it can be sent.
 
 /**
- * The query has `search`, `problems`, `span` and a `device` for each sensor in the chart. Dispatches
- * `change` when the user goes back or forward.
+ * The query has `search`, `problems`, `span` and a `device` for each sensor in the chart.
+ * Dispatches `change` when the user goes back or forward.
  */
 export class Address extends EventTarget {
     constructor() {

@@ -61,7 +61,8 @@ export class Chart {
         const shown = JSON.stringify([history.span, history.sensors.map((each) => each.deviceId)]);
         const options = { file: rowsOf(history), valueRange: valueRangeOf(history, sensor) };
         if (this.#dygraph && shown === this.#shown) {
-            this.#dygraph.updateOptions(this.#dygraph.isZoomed() ? { file: options.file } : options);
+            const isZoomed = this.#dygraph.isZoomed();
+            this.#dygraph.updateOptions(isZoomed ? { file: options.file } : options);
             return;
         }
         this.#shown = shown;

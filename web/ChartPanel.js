@@ -44,7 +44,8 @@ export class ChartPanel {
     /** Shows the sensors in the address of which the machine has, or had, one. */
     show() {
         const { address, machine } = this;
-        this.devices = address.devices.filter((id) => machine.sensors.has(id)).slice(0, mostSensors);
+        const known = address.devices.filter((device) => machine.sensors.has(device));
+        this.devices = known.slice(0, mostSensors);
         this.panel.hidden = this.devices.length === 0;
         clearTimeout(this.#timer);
         if (this.panel.hidden) {

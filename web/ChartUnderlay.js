@@ -12,7 +12,7 @@ const margin = 4;
 export const styleValue = (name) =>
     getComputedStyle(document.documentElement).getPropertyValue(name).trim();
 
-/** Fills the plot behind one sensor's states; of several sensors, each has a strip at the bottom. */
+/** Fills the plot behind one sensor's states; each of several sensors has a strip at the bottom. */
 function drawStates(canvas, area, chart, runsOfSensors) {
     const isStrip = runsOfSensors.length > 1;
     runsOfSensors.forEach((runs, index) => {

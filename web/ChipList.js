@@ -94,7 +94,7 @@ export class ChipList {
     }
 }
 
-/** Inserts the element before the first one that comes after it; `compare` takes another element. */
+/** Inserts the element before those that `compare` returns a positive number for. */
 function insertSorted(parent, element, compare) {
     let next = null;
     for (let other = parent.lastElementChild; other && compare(other) > 0;

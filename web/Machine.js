@@ -70,7 +70,8 @@ export class Machine extends EventTarget {
         for (const deviceId of gone) {
             const known = this.sensors.get(deviceId);
             if (known && !known.isGone)
-                changed.push({ ...known, value: null, urgency: 'lost', isGone: true, ...beginning });
+                changed.push({ ...known, ...beginning, value: null, urgency: 'lost',
+                    isGone: true });
         }
         this.#store(changed);
     }

@@ -56,9 +56,9 @@ function wordsOf(text) {
 }
 
 /**
- * Returns a function that says whether a sensor is searched for: when `sensorctl` selects it by one
- * of the words, or when its names have all of the words as parts. Words such as `kind:fan` limit the
- * sensors to those kinds.
+ * Returns a function that says whether a sensor is searched for: when `sensorctl` selects it by
+ * one of the words, or when its names have all of the words as parts. Words such as `kind:fan`
+ * limit the sensors to those kinds.
  */
 export function searchFor(text) {
     const all = wordsOf(folded(text));

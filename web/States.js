@@ -35,7 +35,7 @@ export function isProblem(urgency) {
     return urgencies.indexOf(urgency) <= urgencies.indexOf('lost');
 }
 
-/** The shapes of the urgencies as SVG paths in a square of 16 units, filled by the even-odd rule. */
+/** The shapes of the urgencies: paths in a square of 16 units, filled by the even-odd rule. */
 export const shapes = {
     critical: 'M5 1h6l4 4v6l-4 4H5l-4-4V5zM7.2 4v5h1.6V4zM7.2 10.4v1.7h1.6v-1.7z',
     warning: 'M8 1.5l7 13H1zM7.3 6v4.3h1.4V6zM7.3 11.3v1.5h1.4v-1.5z',

@@ -106,4 +106,5 @@ class AppearanceTest(PageTest):
         self.assertNotIn("Problems only", text)
 
     def shape(self, texts):
-        return {name: sorted(text) if isinstance(text, dict) else "" for name, text in texts.items()}
+        return {name: sorted(text) if isinstance(text, dict) else ""
+                for name, text in texts.items()}

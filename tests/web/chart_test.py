@@ -11,7 +11,8 @@ from served import wave
 
 CPU1 = "CPU 1 Package Temp:/system/cpu1/package"
 CPU2 = "CPU 2 Package Temp:/system/cpu2/package"
-LEGEND = "[...document.querySelectorAll('#compared bdi:not(.chip-name)')].map(each => each.textContent)"
+LEGEND = ("[...document.querySelectorAll('#compared bdi:not(.chip-name)')]"
+          ".map(each => each.textContent)")
 AXIS = ("[...document.querySelectorAll('#plot .dygraph-axis-label-x')]"
         ".map(each => each.textContent).filter(text => text)")
 

@@ -67,14 +67,16 @@ class LiveTest(PageTest):
         self.assertRegex(self.trouble_text("Battery"), r"Warning low since before \d")
 
     def test_does_not_take_the_begin_of_the_history_for_that_of_a_state(self):
-        script = ("const [states, done] = arguments;"
-                  "window.fetch = () => Promise.resolve(new Response(JSON.stringify({interval: 10,"
-                  " end: 1000, sensors: [{deviceId: 'a', values: [], states}]})));"
-                  "import('/web/HourHistory.js').then(async ({HourHistory}) => {"
-                  " let result; await new HourHistory({setSince: each => { result = each }}).load();"
-                  " done(result[0]); });")
-        for states, is_earlier in (([], True), ([["Lost", 3]], True), ([[None, 5], ["Lost", 3]], True),
-                                   ([["Normal", 5], ["Lost", 3]], False)):
+        script = """
+            const [states, done] = arguments;
+            const document = {interval: 10, end: 1000,
+                sensors: [{deviceId: 'a', values: [], states}]};
+            window.fetch = async () => new Response(JSON.stringify(document));
+            import('/web/HourHistory.js').then(({HourHistory}) =>
+                new HourHistory({setSince: ([first]) => done(first)}).load());"""
+        for states, is_earlier in (
+                ([], True), ([["Lost", 3]], True), ([[None, 5], ["Lost", 3]], True),
+                ([["Normal", 5], ["Lost", 3]], False)):
             with self.subTest(states):
                 result = self.driver.execute_async_script(script, states)
                 self.assertEqual(is_earlier, result["isSinceEarlier"])

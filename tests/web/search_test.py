@@ -58,7 +58,8 @@ class SearchTest(PageTest):
         self.driver.get(self.driver.current_url)
         self.wait_for(f"{VISIBLE}.length === 2")
         self.assertEqual(problems, self.run_script(VISIBLE))
-        self.assertEqual("kind:fan", self.run_script("document.querySelector('[name=search]').value"))
+        self.assertEqual("kind:fan", self.run_script(
+            "document.querySelector('[name=search]').value"))
 
     def test_shows_a_sensor_that_becomes_a_problem(self):
         self.open(self.server, "?problems=1&search=kind:fan")
