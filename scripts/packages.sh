@@ -7,8 +7,8 @@
 build_packages=(
   g++ cmake ninja-build
   libcli11-dev libexpat1-dev libfmt-dev libncurses-dev libsensors-dev libspdlog-dev libutfcpp-dev
-  nlohmann-json3-dev tao-pegtl-dev
-  libcrypt-dev libgnutls28-dev libmicrohttpd-dev libsystemd-dev
+  libjs-dygraphs libkainjow-mustache-dev nlohmann-json3-dev tao-pegtl-dev
+  libcrypt-dev libgnutls28-dev libmicrohttpd-dev libsystemd-dev zlib1g-dev
   pkg-config
 )
 
@@ -18,10 +18,10 @@ check_packages=(
   libbenchmark-dev libgmock-dev libgtest-dev
   binutils lm-sensors locales python3-jsonschema util-linux
   icinga2 openssl sblim-wbemcli tmux
+  chromium chromium-driver fonts-ipafont-gothic poppler-utils python3-selenium
   freeipmi-tools ipmitool libopenipmi-dev openipmi
   prometheus prometheus-alertmanager prometheus-node-exporter victoria-metrics
   python3-prometheus-client python3-yaml
-  chromium chromium-driver fonts-ipafont-gothic libjs-dygraphs poppler-utils python3-selenium
   debootstrap dpkg-dev file iproute2 jq lintian man-db mandoc rpm rpmlint shellcheck systemd valgrind
 )
 

@@ -57,6 +57,7 @@ const std::vector<std::string> toolFiles = {"bin/sensorctl", "etc/sensor-profile
     "share/sensor-profile/deploy/victoria-metrics/remote-write.yml",
     "share/sensor-profile/deploy/victoria-metrics/victoria-metrics.default",
     "share/sensor-profile/host.mof", "share/sensor-profile/interop.mof",
+    "share/sensor-profile/sensor-profile-api.openapi.yaml",
     "share/sensor-profile/sensorctl-list.schema.json"};
 
 TEST(InstalledTest, AreTheProviderAndTheTool)
@@ -64,6 +65,9 @@ TEST(InstalledTest, AreTheProviderAndTheTool)
     std::vector<std::string> all = providerFiles;
     all.insert(all.end(), toolFiles.begin(), toolFiles.end());
     all.emplace_back("share/doc/sensor-profile-provider/LICENSE");
+    for (const std::string& name :
+        filesBelow(SENSOR_PROFILE_BINARY_DIR "/share/sensor-profile/web"))
+        all.push_back("share/sensor-profile/web/" + name);
     std::sort(all.begin(), all.end());
     EXPECT_THAT(filesBelow(movedInstallation()), ElementsAreArray(all));
 }

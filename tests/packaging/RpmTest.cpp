@@ -130,7 +130,8 @@ TEST(RpmTest, OwnsItsFolders)
             "/usr/share/sensor-profile/deploy/prometheus",
             "/usr/share/sensor-profile/deploy/prometheus/rules",
             "/usr/share/sensor-profile/deploy/prometheus/targets",
-            "/usr/share/sensor-profile/deploy/victoria-metrics"));
+            "/usr/share/sensor-profile/deploy/victoria-metrics", "/usr/share/sensor-profile/web",
+            "/usr/share/sensor-profile/web/languages", "/usr/share/sensor-profile/web/styles"));
 }
 
 TEST(RpmTest, BelongsToRootAndCanBeReadByEverybody)
