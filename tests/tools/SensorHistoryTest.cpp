@@ -265,12 +265,13 @@ TEST_F(HistoryFileTest, DamagedFileIsRefusedAndChangesNothing)
     };
     std::string flipped = content;
     flipped[flipped.size() - 5] ^= 1; // in the checksum
-    EXPECT_THAT(problem(flipped), HasSubstr("history: its checksum is wrong"));
-    EXPECT_THAT(problem(content.substr(0, content.size() / 2)), HasSubstr("it is truncated"));
-    EXPECT_THAT(problem(""), HasSubstr("it is truncated"));
+    EXPECT_THAT(problem(flipped), HasSubstr("history: it is damaged or truncated"));
+    EXPECT_THAT(
+        problem(content.substr(0, content.size() / 2)), HasSubstr("it is damaged or truncated"));
+    EXPECT_THAT(problem(""), HasSubstr("it is damaged or truncated"));
     EXPECT_THAT(problem("no history at all, but long enough for a header"),
         HasSubstr("it is of another version"));
-    EXPECT_THAT(problem(bytes()), HasSubstr("its checksum is wrong")); // not compressed
+    EXPECT_THAT(problem(bytes()), HasSubstr("it is damaged or truncated")); // not compressed
     EXPECT_EQ(restored.newest(), 0);
 }
 
@@ -292,7 +293,7 @@ TEST_F(HistoryFileTest, ImpossibleNumbersAreRefused)
     twice[40 + 9 + sizeof(Samples) + 16] = 'a';
     twice[40 + 9 + sizeof(Samples) + 16 + 8] = 'a';
     EXPECT_EQ(problemOf(twice), "it has a sensor twice");
-    EXPECT_EQ(problemOf(stored.substr(0, stored.size() - 1)), "it is truncated");
+    EXPECT_EQ(problemOf(stored.substr(0, stored.size() - 1)), "it is damaged or truncated");
 }
 
 TEST_F(HistoryFileTest, FailureToWriteNamesTheFile)

@@ -180,11 +180,7 @@ protected:
         scrape();
     }
 
-    std::size_t residentKilobytes() const
-    {
-        const std::string status = contentOf("/proc/" + std::to_string(server_->id()) + "/status");
-        return std::stoul(status.substr(status.find("VmRSS:") + 6));
-    }
+    std::size_t residentKilobytes() const { return server_->residentKilobytes(); }
 
     std::size_t descriptors() const
     {

@@ -93,6 +93,12 @@ std::uint16_t ServerProcess::port(const std::string& scheme) const
     return static_cast<std::uint16_t>(std::stoul(text.substr(colon + 1, end - colon - 1)));
 }
 
+std::size_t ServerProcess::residentKilobytes() const
+{
+    const std::string status = contentOf("/proc/" + std::to_string(process_) + "/status");
+    return std::stoul(status.substr(status.find("VmRSS:") + 6));
+}
+
 void ServerProcess::signal(int number) const
 {
     ::kill(process_, number);

@@ -9,6 +9,7 @@
 
 #include <sys/types.h>
 
+#include <cstddef>
 #include <cstdint>
 #include <map>
 #include <string>
@@ -33,6 +34,7 @@ public:
     // Returns the port of the first address of the scheme that it printed.
     std::uint16_t port(const std::string& scheme = "http") const;
     ::pid_t id() const { return process_; }
+    std::size_t residentKilobytes() const;
 
     void signal(int number) const;
     // Waits until the log contains the text. Returns false after a timeout.

@@ -43,6 +43,9 @@ namespace {
 using Host::Http::report;
 using Host::Http::Severity;
 
+// With the default grace period, it is less than the TimeoutStopSec of the unit.
+constexpr std::chrono::seconds timeoutOfPage{5};
+
 constexpr const char* serveFooter =
     "Addresses other than loopback need --certificate, --key and --passwords. A file\n"
     "of passwords has lines of `user:hash`, a configuration file of `name = value`.\n"
@@ -190,11 +193,13 @@ public:
         out.write(text);
         out.flush();
         notifyServiceManager("READY=1");
-        if (serve(server, protection, signals, options_.gracePeriod))
+        const bool isIdle = serve(server, protection, signals, options_.gracePeriod);
+        const bool isPageOver = page.finish(timeoutOfPage);
+        if (isIdle && isPageOver)
             return ExitCode::success;
-        page.finish();
-        complain("requests were still running at the end of the grace period");
-        // The destructor of the server would wait for the requests that still run.
+        complain(isIdle ? "the sensors were still being read"
+                        : "requests were still running at the end of the grace period");
+        // The destructors would wait for what still runs.
         ::_exit(static_cast<int>(ExitCode::failure));
     }
 

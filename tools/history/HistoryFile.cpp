@@ -35,7 +35,8 @@ static_assert(std::has_unique_object_representations_v<Header> &&
               std::has_unique_object_representations_v<SensorHeader>);
 
 constexpr std::uint64_t maximumDeviceId = 4096; // longer ones are not stored
-constexpr Slot greatestSlot = Slot{1} << 40;
+constexpr Slot greatestSlot = Slot{1} << 29;    // in the year 2140
+constexpr const char* damaged = "it is damaged or truncated";
 constexpr ::mode_t modeOfFile = 0600;
 
 void require(bool condition, const char* otherwise)
@@ -112,9 +113,8 @@ void storeHistory(const SensorHistory& history,
 
 StoredHistory parseHistory(const std::function<bool(void* bytes, std::size_t count)>& read)
 {
-    constexpr const char* truncated = "it is truncated";
     Header header;
-    require(read(&header, sizeof header), truncated);
+    require(read(&header, sizeof header), damaged);
     require(header.magic == Header().magic && header.sizeOfSamples == sizeof(Samples),
         "it is of another version");
     require(header.count <= SensorHistory::maximumSensors, "it has too many sensors");
@@ -122,7 +122,7 @@ StoredHistory parseHistory(const std::function<bool(void* bytes, std::size_t cou
     SensorHistory::Entries entries;
     for (std::uint32_t i = 0; i < header.count; ++i) {
         SensorHeader sensor;
-        require(read(&sensor, sizeof sensor), truncated);
+        require(read(&sensor, sizeof sensor), damaged);
         require(sensor.lastSeen >= 0 && sensor.lastSeen <= header.newest,
             "a sensor has an impossible time");
         require(sensor.sizeOfDeviceId > 0 && sensor.sizeOfDeviceId <= maximumDeviceId,
@@ -131,7 +131,7 @@ StoredHistory parseHistory(const std::function<bool(void* bytes, std::size_t cou
         auto entry = std::make_unique<SensorHistory::Entry>();
         require(
             read(deviceId.data(), deviceId.size()) && read(&entry->samples, sizeof entry->samples),
-            truncated);
+            damaged);
         require(entry->samples.isValid(), "a sensor has an impossible state");
         entry->lastSeen = sensor.lastSeen;
         require(
@@ -163,7 +163,7 @@ void readHistoryFile(const std::string& file, SensorHistory& history)
         ::close(descriptor);
         auto [entries, newest] =
             parseHistory([&](void* bytes, std::size_t count) { return gzip.read(bytes, count); });
-        require(gzip.isAtEnd(), "its checksum is wrong");
+        require(gzip.isAtEnd(), damaged);
         history.restore(std::move(entries), newest);
     } catch (const std::runtime_error& error) {
         throw std::runtime_error(file + ": " + error.what());

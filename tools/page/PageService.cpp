@@ -43,6 +43,13 @@ void PageService::addTo(Host::Http::Resources& resources)
         resources.emplace("/", absentPage_);
 }
 
+bool PageService::finish(std::chrono::milliseconds timeout)
+{
+    const bool isOver = sampler_->stop(timeout);
+    keeper_.reset();
+    return isOver;
+}
+
 Host::Http::Representation PageService::AbsentPage::represent(const Host::Http::RequestHead&)
 {
     throw Host::Http::HttpError(404, reason);

@@ -11,6 +11,7 @@
 #include "tools/page/SensorResources.h"
 #include "tools/page/WebFiles.h"
 
+#include <chrono>
 #include <filesystem>
 #include <optional>
 #include <string>
@@ -29,8 +30,9 @@ public:
     // Adds the resources. They belong to this object.
     void addTo(Host::Http::Resources& resources);
 
-    // Writes the history a last time.
-    void finish() { keeper_.reset(); }
+    // Writes the history a last time. Returns false where the sensors are still being read after
+    // the timeout, for which the destructor would wait.
+    bool finish(std::chrono::milliseconds timeout);
 
 private:
     // Answers that the page is not there.

@@ -22,8 +22,17 @@ using SystemClock = std::chrono::system_clock;
 
 Sampler::Sampler(SingleFlight<Harvest>& harvests, ChangeFeed& feed, SensorHistory* history)
     : harvests_(harvests), feed_(feed), history_(history),
-      thread_([this](const std::stop_token& stop) { run(stop); })
+      thread_([this](const std::stop_token& stop) {
+          run(stop);
+          end_.set_value();
+      })
 {
+}
+
+bool Sampler::stop(std::chrono::milliseconds timeout)
+{
+    thread_.request_stop();
+    return end_.get_future().wait_for(timeout) == std::future_status::ready;
 }
 
 void Sampler::run(const std::stop_token& stop)

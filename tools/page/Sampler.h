@@ -7,6 +7,7 @@
 
 #include <chrono>
 #include <cstdint>
+#include <future>
 #include <thread>
 
 namespace Tools {
@@ -23,6 +24,10 @@ public:
     // The history is null where none is kept. All must outlive it.
     Sampler(SingleFlight<Harvest>& harvests, ChangeFeed& feed, SensorHistory* history);
 
+    // Ends the sampling. Returns false where the sensors are still being read after the timeout:
+    // the destructor would wait for that.
+    bool stop(std::chrono::milliseconds timeout);
+
 private:
     void run(const std::stop_token& stop);
     void sample();
@@ -33,7 +38,8 @@ private:
     SensorHistory* const history_;
     std::chrono::steady_clock::time_point sampled_{};
     std::int64_t slot_ = -1; // of the last sample for the history
-    std::jthread thread_;    // last: it uses all of the above
+    std::promise<void> end_;
+    std::jthread thread_; // last: it uses all of the above
 };
 
 } // namespace Tools
