@@ -126,6 +126,7 @@ PageResource::PageResource(
     const WebFiles& files, SingleFlight<Harvest>& harvests, Host::Http::UnsentObjects& unsent)
     : template_(files.contentOf("page.html"))
 {
+    (void)files.contentOf(std::string("languages/") + defaultLanguage + ".json");
     const kainjow::mustache::mustache parsed(template_);
     if (!parsed.is_valid())
         throw std::runtime_error("page.html: " + parsed.error_message());
@@ -138,7 +139,6 @@ PageResource::PageResource(
         };
         pages_.emplace(language, std::make_unique<SingleFlight<UnsentText>>(write));
     }
-    (void)pages_.at(defaultLanguage);
 }
 
 Host::Http::Representation PageResource::represent(const Host::Http::RequestHead& head)
