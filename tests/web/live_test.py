@@ -60,9 +60,8 @@ class LiveTest(PageTest):
         self.assertIn("7936\u00a0RPM", self.row_text("PSU 1 Fan"))
 
     def test_says_since_when_sensors_are_in_trouble(self):
-        self.server.past = lambda node, age: 50 if age > 600 and "cpu2/package" in node["path"] \
-            else node.get("reading")
-        self.open(self.server)
+        self.open(self.serve(Machine.demonstration(), past=lambda node, age: (
+            50 if age > 600 and "cpu2/package" in node["path"] else node.get("reading"))))
         self.assertRegex(self.trouble_text("CPU 2 Package Temp"), r"Warning high since \d")
         self.assertRegex(self.trouble_text("Battery"), r"Warning low since before \d")
 
