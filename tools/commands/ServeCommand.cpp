@@ -47,10 +47,9 @@ using Host::Http::Severity;
 constexpr std::chrono::seconds timeoutOfPage{5};
 
 constexpr const char* serveFooter =
-    "Addresses other than loopback need --certificate, --key and --passwords. A file\n"
-    "of passwords has lines of `user:hash`, a configuration file of `name = value`.\n"
-    "SIGTERM ends the server; SIGHUP has it read certificate, key and passwords anew.\n"
-    "`man sensorctl` describes these files, the log and the limits of clients.";
+    "Addresses other than loopback need --certificate, --key and --passwords. SIGTERM\n"
+    "ends the server; SIGHUP has it read certificate, key and passwords anew. `man\n"
+    "sensorctl` describes these files, the page, the log and the limits of clients.";
 
 // Sets the environment, since the libraries of the providers have logs of their own. The log has
 // the reasons of failures that they report to standard error.
