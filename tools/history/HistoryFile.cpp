@@ -47,11 +47,13 @@ void require(bool condition, const char* otherwise)
 
 class Gzip {
 public:
-    // Reads or writes at a descriptor, which stays open.
-    Gzip(int descriptor, const char* mode) : file_(::gzdopen(::dup(descriptor), mode))
+    // Owns the descriptor from now on.
+    Gzip(int descriptor, const char* mode) : file_(::gzdopen(descriptor, mode))
     {
-        if (file_ == nullptr)
-            throw std::system_error(errno, std::generic_category());
+        if (file_ != nullptr)
+            return;
+        ::close(descriptor);
+        throw std::system_error(errno, std::generic_category());
     }
     ~Gzip()
     {
@@ -143,7 +145,7 @@ StoredHistory parseHistory(const std::function<bool(void* bytes, std::size_t cou
 void writeHistoryFile(const std::string& file, const SensorHistory& history)
 {
     const auto write = [&](int descriptor) {
-        Gzip gzip(descriptor, "wb1"); // fast: higher levels save little
+        Gzip gzip(::dup(descriptor), "wb1"); // fast: higher levels save little
         storeHistory(
             history, [&](const void* bytes, std::size_t count) { gzip.write(bytes, count); });
         gzip.finish();
@@ -160,7 +162,6 @@ void readHistoryFile(const std::string& file, SensorHistory& history)
         throw std::runtime_error(file + ": " + std::generic_category().message(errno));
     try {
         Gzip gzip(descriptor, "rb");
-        ::close(descriptor);
         auto [entries, newest] =
             parseHistory([&](void* bytes, std::size_t count) { return gzip.read(bytes, count); });
         require(gzip.isAtEnd(), damaged);
