@@ -7,9 +7,6 @@
 
 #include <microhttpd.h>
 
-#include <algorithm>
-#include <cstring>
-
 namespace Host::Http {
 
 StreamedAnswer::StreamedAnswer(
@@ -43,8 +40,7 @@ StreamedAnswer::~StreamedAnswer()
         report({"read", "StreamedAnswer", __LINE__}, "a stream broke off");
         return MHD_CONTENT_READER_END_WITH_ERROR;
     }
-    const std::size_t count = std::min(room, piece_->size() - sent_);
-    std::memcpy(to, piece_->data() + sent_, count);
+    const std::size_t count = piece_->copy(to, room, sent_);
     sent_ += count;
     return static_cast<::ssize_t>(count);
 }

@@ -107,7 +107,8 @@ TEST_F(PageTest, NothingOfItIsFromElsewhere)
         EXPECT_EQ(reply.field("referrer-policy"), "no-referrer");
         EXPECT_EQ(reply.field("set-cookie"), "");
     }
-    EXPECT_EQ(ask(HttpClient(server.port()), "GET / HTTP/1.1\r\nHost: attacker.example\r\n\r\n").status,
+    EXPECT_EQ(
+        ask(HttpClient(server.port()), "GET / HTTP/1.1\r\nHost: attacker.example\r\n\r\n").status,
         421);
 }
 
@@ -152,7 +153,8 @@ TEST_F(PageTest, FilesAreReadAgainOnlyWhenTheyHaveChanged)
     EXPECT_EQ(known.body, "");
     EXPECT_EQ(known.field("etag"), plain.field("etag"));
     EXPECT_EQ(read(server, "/web/Main.js", "If-None-Match: \"x\"\r\n").status, 200);
-    EXPECT_EQ(read(server, "/web/Main.js", "Accept-Encoding: gzip;q=0\r\n").field("content-encoding"),
+    EXPECT_EQ(
+        read(server, "/web/Main.js", "Accept-Encoding: gzip;q=0\r\n").field("content-encoding"),
         "");
     for (const char* const absent : {"/web/page.html", "/web/Main.js.gz", "/web/../host.mof"})
         EXPECT_EQ(read(server, absent).status, 404) << absent;
@@ -172,8 +174,8 @@ TEST_F(PageTest, WithoutItsFilesTheRestWorks)
 TEST_F(PageTest, ListIsTheDocumentOfTheCommand)
 {
     const ServerProcess server(withModel());
-    EXPECT_EQ(readJson(server, "/api/sensors"),
-        json::parse(run(withModel({"list", "--json"})).out));
+    EXPECT_EQ(
+        readJson(server, "/api/sensors"), json::parse(run(withModel({"list", "--json"})).out));
 }
 
 TEST_F(PageTest, ChangeIsSentWithinThreeSeconds)
@@ -272,13 +274,14 @@ TEST_F(PageTest, FolderThatCannotBeWrittenIsRefused)
         arguments.insert(arguments.end(), {"--user", "root"});
     const Ended ended = failing(arguments);
     EXPECT_EQ(ended.code, 1);
-    EXPECT_EQ(ended.err,
-        "sensorctl: cannot keep the history in /proc/none: No such file or directory\n");
+    EXPECT_EQ(
+        ended.err, "sensorctl: cannot keep the history in /proc/none: No such file or directory\n");
 }
 
 TEST_F(PageTest, HistoryCanBeOff)
 {
-    const ServerProcess server(withModel({"--history", "off"}), {{"STATE_DIRECTORY", "/proc/none"}});
+    const ServerProcess server(
+        withModel({"--history", "off"}), {{"STATE_DIRECTORY", "/proc/none"}});
     EXPECT_EQ(read(server, thinnedHour()).status, 404);
     EXPECT_EQ(readJson(server, thinnedHour())["error"], "the server keeps no history");
 }

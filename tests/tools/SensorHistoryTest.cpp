@@ -52,9 +52,8 @@ protected:
     static json jsonOf(const SensorHistory& from, const std::string& label, Append append)
     {
         std::string text;
-        from.visit(label + ":/chip/" + label, [&](const Samples& samples, Slot newest) {
-            append(text, label, samples, newest);
-        });
+        from.visit(label + ":/chip/" + label,
+            [&](const Samples& samples, Slot newest) { append(text, label, samples, newest); });
         return text.empty() ? json() : json::parse(text);
     }
     json hour(const std::string& label) const
@@ -73,7 +72,8 @@ protected:
 
     static json last(const json& values, std::size_t count)
     {
-        return json(std::vector<json>(values.end() - static_cast<std::ptrdiff_t>(count), values.end()));
+        return json(
+            std::vector<json>(values.end() - static_cast<std::ptrdiff_t>(count), values.end()));
     }
 
     SensorHistory history;

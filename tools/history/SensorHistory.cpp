@@ -47,7 +47,7 @@ void SensorHistory::add(
         }
         found->second->samples.add(slot, *sensor);
         found->second->lastSeen = slot;
-        present_.push_back(found);
+        present_.emplace_back(found);
     }
 }
 

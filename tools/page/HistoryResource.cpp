@@ -96,11 +96,11 @@ std::string historyOf(const SensorHistory& history, const Query& query)
 
     const bool isOfMinutes = query.span == "day" || query.isThinned;
     const Slot endOfMinutes = (minuteOf(end - 1) + 1) * secondsOfMinute;
-    return "{\"span\": \"" + query.span +
-           "\", \"interval\": " + std::to_string(isOfMinutes ? secondsOfMinute : secondsOfSlot) +
-           ", \"end\": " +
+    const int interval = isOfMinutes ? secondsOfMinute : secondsOfSlot;
+    return R"({"span": ")" + query.span + R"(", "interval": )" + std::to_string(interval) +
+           R"(, "end": )" +
            std::to_string(query.span == "day" ? endOfMinutes : end * secondsOfSlot) +
-           ", \"sensors\": [" + sensors + "]}\n";
+           R"(, "sensors": [)" + sensors + "]}\n";
 }
 
 std::string errorText(const Problem& problem)

@@ -63,8 +63,8 @@ Data chipsOf(const std::vector<const Sensor*>& sensors, const Texts& texts)
         Data chip;
         chip.set("chip", (*first)->chip);
         chip.set("device", (*first)->device);
-        chip.set("sensors", std::move(rows));
-        chips.push_back(std::move(chip));
+        chip.set("sensors", rows);
+        chips.push_back(chip);
         first = next;
     }
     return chips;
@@ -82,7 +82,7 @@ Data countsOf(const Sensors& sensors, const Texts& texts)
         count.set("urgency", word);
         count.set("number", std::to_string(counts[urgency]));
         count.set("word", textIn(texts.at("urgencies"), word));
-        list.push_back(std::move(count));
+        list.push_back(count);
     }
     return list;
 }
