@@ -95,8 +95,10 @@ export class Overview {
             ++numbers[sensor.urgency];
         for (const item of this.counts.children) {
             const number = String(numbers[item.dataset.urgency]);
+            if (item.dataset.number === number)
+                continue;
             item.dataset.number = number;
-            setText(item.querySelector('b'), number);
+            item.querySelector('b').textContent = number;
         }
         const problems = this.machine.troubles().length;
         const name = document.querySelector('h1').textContent;

@@ -14,7 +14,7 @@ import yaml
 
 from browser import npm_file
 from machine import ROOT, Machine
-from served import Server, wave
+from served import Server, demonstration
 
 FILE = ROOT / "schema/sensor-profile-api.openapi.yaml"
 FAN = "PSU 1 Fan:/system/psu1/fan"
@@ -35,9 +35,7 @@ def bundled():
 class ApiTest(unittest.TestCase):
     def setUp(self):
         self.document = bundled()
-        self.machine = Machine.demonstration()
-        self.server = Server(self.machine, past=wave).start()
-        self.addCleanup(self.server.stop)
+        self.server = demonstration()
 
     def check(self, value, schema):
         """Checks a value by a schema in the OpenAPI file."""
@@ -94,9 +92,12 @@ class ApiTest(unittest.TestCase):
         self.assertEqual(404, self.ask("/api/history", ("span", "hour"), ("device", "none"))[0])
 
     def test_sends_the_list_and_then_changes(self):
+        machine = Machine.demonstration()
+        server = Server(machine).start()
+        self.addCleanup(server.stop)
         schemas = {"sensors": {"$ref": "#/components/schemas/List"},
                    "changes": {"$ref": "#/components/schemas/Changes"}}
-        with urllib.request.urlopen(self.server.address + "api/events", timeout=10) as answer:
+        with urllib.request.urlopen(server.address + "api/events", timeout=10) as answer:
             self.assertEqual("text/event-stream", answer.headers.get_content_type())
             for expected in ("sensors", "changes"):
                 lines = []
@@ -106,5 +107,5 @@ class ApiTest(unittest.TestCase):
                 self.assertEqual(expected, event["event"])
                 data = json.loads(event["data"])
                 self.check(data, schemas[expected])
-                self.machine.remove_chip("/system/psu1")
+                machine.remove_chip("/system/psu1")
         self.assertIn(FAN, data["gone"])

@@ -61,14 +61,15 @@ class PageTest(unittest.TestCase):
         return server
 
     def look(self, width=1280, height=900, scheme="light", language="en", has_scripts=True,
-             media=""):
-        """Sets how the following pages are looked at."""
+             motion="reduce"):
+        """Sets how the page and the following ones are looked at."""
         command = self.driver.execute_cdp_cmd
         command("Network.enable", {})
         command("Emulation.setDeviceMetricsOverride", {
             "width": width, "height": height, "deviceScaleFactor": 1, "mobile": width < 600})
-        command("Emulation.setEmulatedMedia", {"media": media, "features": [
-            {"name": "prefers-color-scheme", "value": scheme}]})
+        command("Emulation.setEmulatedMedia", {"features": [
+            {"name": "prefers-color-scheme", "value": scheme},
+            {"name": "prefers-reduced-motion", "value": motion}]})
         command("Network.setExtraHTTPHeaders", {"headers": {"Accept-Language": language}})
         command("Emulation.setScriptExecutionDisabled", {"value": not has_scripts})
 
@@ -95,6 +96,13 @@ class PageTest(unittest.TestCase):
             "[...document.querySelectorAll('.chips .sensor')]"
             ".find(row => row.querySelector('button').textContent === arguments[0])?.innerText",
             label)
+
+    def search(self, text):
+        """Searches, and returns the number of sensors that are found."""
+        return self.driver.execute_script(
+            "const field = document.querySelector('[name=search]'); field.value = arguments[0];"
+            "field.dispatchEvent(new Event('input', {bubbles: true}));"
+            "return document.querySelectorAll('.chips .sensor:not([hidden])').length", text)
 
     def press(self, *keys):
         """Presses keys, wherever the focus is."""

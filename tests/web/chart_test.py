@@ -7,7 +7,7 @@ from selenium.webdriver.support.ui import Select
 
 from browser import PageTest
 from machine import Machine
-from served import wave
+from served import demonstration
 
 CPU1 = "CPU 1 Package Temp:/system/cpu1/package"
 CPU2 = "CPU 2 Package Temp:/system/cpu2/package"
@@ -36,7 +36,7 @@ DRAWS = """(() => {
 class ChartTest(PageTest):
     def setUp(self):
         super().setUp()
-        self.server = self.serve(Machine.demonstration(), past=wave)
+        self.server = demonstration()
 
     def open_chart(self, query):
         self.open(self.server, query)
@@ -54,6 +54,9 @@ class ChartTest(PageTest):
         self.driver.find_element("id", "chart-close").click()
         self.assertTrue(self.run_script("document.querySelector('#chart').hidden"))
         self.assertNotIn("device", self.driver.current_url)
+        self.look(width=1000)
+        self.driver.back()
+        self.wait_for("document.querySelector('#plot canvas')?.clientWidth > 900")
 
     def test_compares_sensors_of_one_unit(self):
         self.open_chart("?device=" + CPU2)
@@ -72,20 +75,15 @@ class ChartTest(PageTest):
 
     def test_zooms_by_the_pointer_and_back_by_the_button(self):
         self.open_chart("?device=" + CPU2)
-        whole = self.run_script(AXIS)
+        whole = ",".join(self.run_script(AXIS))
         plot = self.driver.find_element("id", "plot")
-        ActionChains(self.driver).move_to_element(plot).click_and_hold().move_by_offset(
-            150, 0).release().perform()
-        self.wait_for(f"{AXIS}.join() !== arguments[0]", 3, ",".join(whole))
-        self.driver.find_element("css selector", "[data-zoom=all]").click()
-        self.wait_for(f"{AXIS}.join() === arguments[0]", 3, ",".join(whole))
-
-    def test_shows_the_reading_at_the_pointer(self):
-        self.open_chart("?device=" + CPU2)
-        ActionChains(self.driver).move_to_element(
-            self.driver.find_element("id", "plot")).perform()
+        ActionChains(self.driver, duration=50).move_to_element(plot).click_and_hold(
+        ).move_by_offset(150, 0).release().perform()
+        self.wait_for(f"{AXIS}.join() !== arguments[0]", 3, whole)
         self.wait_for("/°C \\(.*:.*:/.test("
                       "document.querySelector('#compared .value').textContent)", 3)
+        self.driver.find_element("css selector", "[data-zoom=all]").click()
+        self.wait_for(f"{AXIS}.join() === arguments[0]", 3, whole)
 
     def test_shows_the_last_day(self):
         self.open_chart("?device=" + CPU2)
@@ -95,19 +93,15 @@ class ChartTest(PageTest):
         self.assertIn("span=day", self.driver.current_url)
         self.assertEqual("true", self.run_script(
             "document.querySelector('[data-span=day]').ariaPressed"))
+        self.assertIn("Prometheus", self.driver.find_element("id", "chart").text)
 
-    def test_takes_the_size_of_the_window_when_it_opens_again(self):
+    def test_draws_limits_and_states(self):
         self.open_chart("?device=" + CPU2)
-        self.driver.find_element("id", "chart-close").click()
-        self.look(width=1000)
-        self.driver.back()
-        self.wait_for("document.querySelector('#plot canvas')?.clientWidth > 900")
-
-    def test_follows_the_color_scheme(self):
-        self.open_chart("?device=" + CPU2)
-        self.wait_for(DRAWS, 5, "--critical")
-        self.look(scheme="dark")
-        self.wait_for(DRAWS, 5, "--critical")
+        for scheme in ("light", "dark"):
+            self.look(scheme=scheme)
+            for name in ("--critical", "--warning-band"):
+                with self.subTest(name, scheme=scheme):
+                    self.wait_for(DRAWS, 5, name)
 
     def test_lists_the_states_in_words(self):
         self.open_chart("?device=" + CPU2)
@@ -117,20 +111,9 @@ class ChartTest(PageTest):
         self.assertRegex(states[0], "CPU 2 Package Temp.*: Warning high, ")
         self.assertTrue(any("Normal" in state for state in states), states)
 
-    def test_draws_limits_and_states(self):
-        self.open_chart("?device=" + CPU2)
-        for name in ("--critical", "--warning-band"):
-            with self.subTest(name):
-                self.wait_for(DRAWS, 5, name)
-
-    def test_says_where_longer_histories_are(self):
-        self.open_chart("?device=" + CPU2)
-        self.assertIn("Prometheus", self.driver.find_element("id", "chart").text)
-
     def test_says_when_there_is_no_history(self):
         self.expected_errors = ("/api/history",)
-        self.open_chart("?device=" + CPU2)
-        self.server.keep_history(False)
-        self.driver.find_element("css selector", "[data-span=day]").click()
+        self.open(self.serve(Machine.demonstration(), is_history_kept=False),
+                  "?device=" + CPU2)
         self.wait_for("document.querySelector('#plot-summary').textContent"
                       " === 'No history is available.'")

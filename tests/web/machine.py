@@ -2,9 +2,9 @@
 
 """A machine whose sensors a test moves, in the form of a model file."""
 
+import contextlib
 import json
 import pathlib
-import threading
 
 ROOT = pathlib.Path(__file__).resolve().parents[2]
 
@@ -23,11 +23,10 @@ def status_of(node):
 
 
 class Machine:
-    """The nodes of a model file. All methods may be called while a server reads them."""
+    """The nodes of a model file. Calls `on_change` after each change."""
 
     def __init__(self, nodes):
         self._nodes = {node["path"]: dict(node) for node in nodes}
-        self._lock = threading.Lock()
         self.on_change = lambda: None
 
     @classmethod
@@ -53,8 +52,7 @@ class Machine:
 
     def nodes(self):
         """Returns copies of the nodes."""
-        with self._lock:
-            return [dict(node) for node in self._nodes.values()]
+        return [dict(node) for node in self._nodes.values()]
 
     def write(self, file):
         """Replaces a model file."""
@@ -62,37 +60,39 @@ class Machine:
         new.write_text(json.dumps({"nodes": self.nodes()}))
         new.rename(file)
 
+    @contextlib.contextmanager
+    def changes(self):
+        """Makes one change of all that happens meanwhile."""
+        on_change, self.on_change = self.on_change, lambda: None
+        try:
+            yield
+        finally:
+            self.on_change = on_change
+        on_change()
+
     def set_reading(self, path, reading):
         """Sets a reading and the state that follows from it."""
-        self.set_readings({path: reading})
-
-    def set_readings(self, readings):
-        """Sets readings by path, at the same time."""
-        with self._lock:
-            for path, reading in readings.items():
-                self._nodes[path]["reading"] = reading
-                self._nodes[path]["status"] = status_of(self._nodes[path])
+        self._nodes[path]["reading"] = reading
+        self._nodes[path]["status"] = status_of(self._nodes[path])
         self.on_change()
 
-    def lose(self, path):
-        """Ends the communication with a sensor."""
-        with self._lock:
-            self._nodes[path].pop("reading", None)
-            self._nodes[path]["status"] = LOST
+    def change_temperatures(self, count, reading):
+        """Changes the readings of the first temperatures; returns the identifiers of the sensors."""
+        nodes = [node for node in self._nodes.values() if node["type"] == "temperature"][:count]
+        for index, node in enumerate(nodes):
+            node["reading"] = reading + index % 2 / 100
         self.on_change()
+        return [f"{node['description']}:{node['path']}" for node in nodes]
 
     def remove_chip(self, folder):
         """Removes a chip and returns its nodes, for `add`."""
-        with self._lock:
-            removed = [node for path, node in self._nodes.items()
-                       if path.rsplit("/", 1)[0] == folder]
-            for node in removed:
-                del self._nodes[node["path"]]
+        removed = [node for path, node in self._nodes.items() if path.rsplit("/", 1)[0] == folder]
+        for node in removed:
+            del self._nodes[node["path"]]
         self.on_change()
         return removed
 
     def add(self, nodes):
         """Adds nodes."""
-        with self._lock:
-            self._nodes.update({node["path"]: dict(node) for node in nodes})
+        self._nodes.update({node["path"]: dict(node) for node in nodes})
         self.on_change()

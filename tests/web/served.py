@@ -3,6 +3,7 @@
 """`sensorctl serve` with a machine that a test changes."""
 
 import atexit
+import functools
 import math
 import os
 import pathlib
@@ -11,6 +12,7 @@ import subprocess
 import tempfile
 
 from history_file import write_history
+from machine import Machine
 
 SENSORCTL = os.environ["SENSOR_PROFILE_SENSORCTL"]
 ESTABLISHED = "01"  # in /proc/net/tcp
@@ -19,20 +21,21 @@ ESTABLISHED = "01"  # in /proc/net/tcp
 class Server:
     """
     Serves a machine on a port of the loopback address, with a history: `past` returns the reading of
-    a node some seconds ago. Follows the changes of the machine.
+    a node some seconds ago; without it, the history begins now. Follows the changes of the machine.
     """
 
-    def __init__(self, machine, past=lambda node, age: node.get("reading")):
+    def __init__(self, machine, past=None, is_history_kept=True):
         self.machine = machine
         self.port = 0
         self.process = None
-        self.is_history_kept = True
+        self.is_history_kept = is_history_kept
         self.folder = tempfile.TemporaryDirectory()  # pylint: disable=consider-using-with
         atexit.register(self.folder.cleanup)
         self.model = pathlib.Path(self.folder.name) / "model.json"
         machine.on_change = lambda: machine.write(self.model)
         machine.on_change()
-        write_history(f"{self.folder.name}/history", machine.nodes(), past)
+        if past:
+            write_history(f"{self.folder.name}/history", machine.nodes(), past)
 
     @property
     def address(self):
@@ -45,12 +48,6 @@ class Server:
         with open("/proc/net/tcp", encoding="ascii") as connections:
             rows = [line.split() for line in connections]
         return sum(row[1].endswith(f":{self.port:04X}") and row[3] == ESTABLISHED for row in rows)
-
-    def keep_history(self, is_kept):
-        """Restarts the server with or without a history."""
-        self.stop()
-        self.is_history_kept = is_kept
-        self.start()
 
     def start(self):
         """Starts the server, on the port that it had before."""
@@ -78,3 +75,11 @@ def wave(node, age):
     drift = math.sin((age / 700) + seed) + 0.4 * math.sin(age / 97 + 3 * seed)
     start = math.sin(seed) + 0.4 * math.sin(3 * seed)
     return round(node["reading"] * (1 + swing * (drift - start)), 3)
+
+
+@functools.cache
+def demonstration():
+    """Returns the one server for all tests that do not change the machine."""
+    server = Server(Machine.demonstration(), past=wave).start()
+    atexit.register(server.stop)
+    return server

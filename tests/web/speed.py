@@ -1,9 +1,10 @@
 # Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-"""The page of a machine with 1,000 sensors."""
+"""Measures the page of a machine with 1,000 sensors: `bench/run page`."""
 
 import os
 import pathlib
+import statistics
 import time
 
 from browser import PageTest
@@ -12,7 +13,8 @@ from machine import Machine
 SENSORS = 1000
 CHANGED = 200  # sensors in each period
 PERIOD = 2
-ATTEMPTS = 5  # the machine may be busy with something else during one
+PERIODS = 8
+LOADS = 9
 
 
 def processes_below(process):
@@ -31,52 +33,39 @@ def processor_seconds(processes):
     return ticks / os.sysconf("SC_CLK_TCK")
 
 
-class SpeedTest(PageTest):
+class SpeedBenchmark(PageTest):
     def setUp(self):
         super().setUp()
         self.machine = Machine.of_size(SENSORS)
         self.server = self.serve(self.machine)
 
-    def test_is_usable_within_a_second(self):
-        seconds = []
-        while len(seconds) < ATTEMPTS and min(seconds, default=1) >= 1:
-            seconds.append(self.seconds_until_usable())
-        print(f"{SENSORS} sensors are usable after {min(seconds):.2f} s")
-        self.assertLess(min(seconds), 1)
+    def test_time_until_usable(self):
+        seconds = [self.seconds_until_usable() for _ in range(LOADS)]
+        print(f"{SENSORS} sensors are usable after {statistics.median(seconds):.2f} s, "
+              f"the median of {LOADS} loads ({min(seconds):.2f} to {max(seconds):.2f} s)")
 
-    def test_uses_little_of_a_core_while_live(self):
+    def test_processor_time_while_live(self):
         self.open(self.server)
         time.sleep(PERIOD)
-        share = self.share_while_live()
-        print(f"{SENSORS} live sensors use {100 * share:.1f} % of a core")
-        self.assertLess(share, 0.05)
+        shares = sorted(self.share_while_live(period) for period in range(PERIODS))
+        print(f"{SENSORS} sensors, of which {CHANGED} change every {PERIOD} s, use "
+              f"{100 * statistics.median(shares):.1f} % of a core, the median of {PERIODS} periods "
+              f"({100 * shares[0]:.1f} to {100 * shares[-1]:.1f} %)")
 
     def seconds_until_usable(self):
         """Returns the time from the request until a search has found sensors."""
         self.driver.get("about:blank")
         begin = time.monotonic()
         self.open(self.server)
-        found = self.driver.execute_script(
-            "const search = document.querySelector('[name=search]');"
-            "search.value = 'board 99';"
-            "search.dispatchEvent(new Event('input', {bubbles: true}));"
-            "return document.querySelectorAll('.chips .sensor:not([hidden])').length;")
+        found = self.search("board 99")
         seconds = time.monotonic() - begin
         self.assertEqual(10, found)
-        self.assertEqual(SENSORS, self.run_script(
-            "document.querySelectorAll('.chips .sensor').length"))
         return seconds
 
-    def share_while_live(self):
-        """Returns which part of a core all processes of the browser use."""
+    def share_while_live(self, period):
+        """Returns which part of a core all processes of the browser use in a period."""
         processes = processes_below(self.driver.service.process.pid)
-        paths = [node["path"] for node in self.machine.nodes() if node["type"] == "temperature"]
         begin, spent = time.monotonic(), processor_seconds(processes)
-        for period in range(4):
-            self.machine.set_readings({path: 45 + (index + period) % 9
-                                       for index, path in enumerate(paths[:CHANGED])})
-            time.sleep(PERIOD)
-        share = (processor_seconds(processes) - spent) / (time.monotonic() - begin)
-        self.wait_for("[...document.querySelectorAll('.chips .sensor')].find(row => row.textContent"
-                      ".includes('Board 0 temperature 0')).textContent.includes('48.0')")
-        return share
+        self.machine.change_temperatures(CHANGED, 45 + period % 9)
+        time.sleep(PERIOD)
+        return (processor_seconds(processes) - spent) / (time.monotonic() - begin)
