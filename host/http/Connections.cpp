@@ -98,7 +98,8 @@ void Connections::enter(ClientConnection& connection, Phase phase)
     if (phase == Phase::idle && isShuttingDown_)
         ::shutdown(connection.descriptor, SHUT_RD);
     connection.phase = phase;
-    connection.deadline = Clock::now() + timeoutOf(phase);
+    const bool isLastPiece = isShuttingDown_ && connection.stream != nullptr;
+    connection.deadline = Clock::now() + timeoutOf(isLastPiece ? Phase::receiving : phase);
 }
 
 bool Connections::beginStream(ClientConnection& connection, Stream& stream)
@@ -128,6 +129,14 @@ void Connections::endStream(ClientConnection& connection) noexcept
     connection.stream = nullptr;
 }
 
+void Connections::endStreams()
+{
+    const std::lock_guard lock(mutex_);
+    for (const ClientConnection& connection : all_)
+        if (connection.stream != nullptr)
+            connection.stream->end();
+}
+
 std::chrono::seconds Connections::timeoutOf(Phase phase) const
 {
     switch (phase) {
@@ -153,8 +162,10 @@ void Connections::beginShutdown()
             ::shutdown(connection.descriptor, SHUT_RD);
         if (connection.phase == Phase::receiving)
             connection.deadline = std::min(connection.deadline, latest);
-        if (connection.stream != nullptr)
+        if (connection.stream != nullptr) { // also while the client fetches a piece
             connection.stream->end();
+            connection.deadline = std::min(connection.deadline, latest);
+        }
     }
     changed_.notify_all();
 }

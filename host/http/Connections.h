@@ -82,6 +82,8 @@ public:
     // Returns false where half of the connections, or of those of the address, are streams.
     bool beginStream(ClientConnection& connection, Stream& stream);
     void endStream(ClientConnection& connection) noexcept;
+    // Ends all streams.
+    void endStreams();
 
     // From now on no connection stays open for a further request. Idle connections are closed now,
     // the others after their answer, or soon when their request does not arrive. Idempotent.

@@ -32,6 +32,7 @@ void Server::replaceCertificate(std::shared_ptr<const Certificate> certificate)
 void Server::replacePasswords(std::shared_ptr<const Passwords> passwords)
 {
     service_->signIns.replacePasswords(std::move(passwords));
+    service_->connections.endStreams(); // whose clients sign in again
 }
 
 void Server::beginShutdown()

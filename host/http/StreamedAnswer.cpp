@@ -36,6 +36,8 @@ StreamedAnswer::~StreamedAnswer()
             if (!piece_)
                 return MHD_CONTENT_READER_END_OF_STREAM;
         }
+        if (sent_ > 0)
+            enter_(Phase::fetching); // the client takes the piece, if slowly
     } catch (...) {
         report({"read", "StreamedAnswer", __LINE__}, "a stream broke off");
         return MHD_CONTENT_READER_END_WITH_ERROR;

@@ -159,6 +159,25 @@ TEST_F(StreamTest, ShutdownEndsItAtOnce)
     EXPECT_TRUE(receives(client, "0\r\n\r\n"));
 }
 
+TEST_F(StreamTest, ShutdownDoesNotWaitForAClientThatDoesNotRead)
+{
+    start();
+    HttpClient client = openStream();
+    stream.add(std::string(std::size_t{32} << 20, 'x'));
+    ASSERT_TRUE(receives(client, "xxx"));
+    server->beginShutdown();
+    EXPECT_TRUE(server->waitUntilIdle(std::chrono::seconds(5)));
+}
+
+TEST_F(StreamTest, NewPasswordsEndIt)
+{
+    start();
+    const HttpClient client = openStream();
+    ASSERT_TRUE(waitForOpen(1));
+    server->replacePasswords(nullptr);
+    EXPECT_TRUE(waitForOpen(0));
+}
+
 TEST_F(StreamTest, HalfOfTheConnectionsOfAnAddressStayFreeForOtherRequests)
 {
     limits.maximumConnectionsPerAddress = 4;
