@@ -78,6 +78,9 @@ void checkResourceRequest(const RequestHead& head, bool isLoopback)
     if (head.method != "GET" && head.method != "HEAD")
         throw HttpError(MHD_HTTP_METHOD_NOT_ALLOWED, "the resource is read by GET or HEAD", {},
             {{"Allow", "GET, HEAD"}});
+    // Pages of other sites may only lead here.
+    if (head.find("Sec-Fetch-Site") == "cross-site" && head.find("Sec-Fetch-Mode") != "navigate")
+        throw HttpError(MHD_HTTP_FORBIDDEN, "pages of other sites must not read the resource");
     const auto host = head.find("Host");
     if (isLoopback && host && !isThisMachine(hostIn(*host)))
         throw HttpError(MHD_HTTP_MISDIRECTED_REQUEST,

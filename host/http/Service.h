@@ -44,7 +44,7 @@ private:
     std::shared_ptr<const Certificate> certificate_;
 };
 
-// Requests for resources that are answered at a time; one more is refused.
+// Requests for resources that are answered at a time; others wait.
 inline constexpr std::size_t maximumReaders = 32;
 
 // What all connections of a server share.
@@ -55,7 +55,7 @@ struct Service {
         : operations(handler), resources(std::move(given)), limits(bounds),
           certificate(std::move(firstCertificate)),
           signIns(std::move(passwords), limits.signInDelay), unsent(limits.maximumUnsentObjects),
-          work(limits.workers, limits.maximumQueue), readers(maximumReaders, 0),
+          work(limits.workers, limits.maximumQueue), readers(maximumReaders, limits.maximumQueue),
           readersSigningIn(1, limits.maximumQueue), responses(counts)
     {
     }

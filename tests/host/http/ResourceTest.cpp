@@ -177,10 +177,22 @@ TEST_F(ResourceTest, WaitsForNoOperationAndNoOperationWaitsForIt)
     EXPECT_EQ(reading.receive().status, 200);
 }
 
+TEST_F(ResourceTest, PagesOfOtherSitesMayOnlyLeadThere)
+{
+    start();
+    const std::string local = "Host: localhost\r\nSec-Fetch-Site: ";
+    EXPECT_EQ(ask(get(local + "cross-site\r\nSec-Fetch-Mode: no-cors\r\n")).status, 403);
+    EXPECT_EQ(ask(get(local + "cross-site\r\n")).status, 403);
+    EXPECT_EQ(stub.calls, 0);
+    EXPECT_EQ(ask(get(local + "cross-site\r\nSec-Fetch-Mode: navigate\r\n")).status, 200);
+    EXPECT_EQ(ask(get(local + "same-origin\r\nSec-Fetch-Mode: cors\r\n")).status, 200);
+}
+
 TEST_F(ResourceTest, TooManyReadersAtATimeAreRefused)
 {
     std::promise<void> goOn;
     stub.work = [signal = goOn.get_future().share()] { signal.wait(); };
+    limits.maximumQueue = 0;
     start();
     std::vector<HttpClient> readers;
     for (std::size_t i = 0; i < Host::Http::maximumReaders; ++i) {
