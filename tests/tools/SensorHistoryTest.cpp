@@ -5,16 +5,20 @@
 #include "tests/support/ErrorOf.h"
 #include "tests/support/TemporaryFolder.h"
 #include "tests/support/Texts.h"
+#include "tests/support/WaitUntil.h"
 #include "tools/history/HistoryFile.h"
 #include "tools/history/HistoryJson.h"
+#include "tools/history/HistoryKeeper.h"
 
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 #include <nlohmann/json.hpp>
 
 #include <sys/stat.h>
+#include <unistd.h>
 
 #include <cstring>
+#include <filesystem>
 #include <fstream>
 
 namespace SensorHistoryTests {
@@ -52,9 +56,11 @@ protected:
     static json jsonOf(const SensorHistory& from, const std::string& label, Append append)
     {
         std::string text;
-        from.visit(label + ":/chip/" + label,
-            [&](const Samples& samples, Slot newest) { append(text, label, samples, newest); });
-        return text.empty() ? json() : json::parse(text);
+        const bool isKnown = from.visit({label + ":/chip/" + label},
+            [&](const std::string&, const Samples& samples, Slot newest) {
+                append(text, label, samples, newest);
+            });
+        return isKnown ? json::parse(text) : json();
     }
     json hour(const std::string& label) const
     {
@@ -178,6 +184,60 @@ TEST_F(SensorHistoryTest, OfManySensorsTheNumberIsBounded)
     EXPECT_EQ(history.deviceIds().size(), SensorHistory::maximumSensors);
 }
 
+TEST_F(SensorHistoryTest, SensorsThatAreGoneLongestMakeRoomForNewOnes)
+{
+    for (int i = 0; i < 1000; ++i)
+        add({sensorOf("a", 1), sensorOf(std::to_string(i), 1)}, 10 * i);
+    EXPECT_EQ(history.deviceIds().size(), 104U);
+    EXPECT_TRUE(hour("896").is_null());
+    EXPECT_FALSE(hour("897").is_null());
+    EXPECT_EQ(hour("a")["states"], json::parse(R"([["Normal", 360]])"));
+}
+
+TEST_F(SensorHistoryTest, SensorsOfOneAnswerAreOfTheSameTime)
+{
+    add({sensorOf("a", 1)}, 0);
+    std::vector<std::string> seen;
+    EXPECT_TRUE(history.visit({"none", "a:/chip/a"},
+        [&](const std::string& deviceId, const Samples& samples, Slot newest) {
+            seen.push_back(deviceId + std::to_string(samples.ofSlot(newest).state));
+        }));
+    EXPECT_THAT(seen, testing::ElementsAre("none0", "a:/chip/a2"));
+    EXPECT_FALSE(history.visit({"none"}, [](auto&&...) {}));
+}
+
+TEST_F(SensorHistoryTest, NothingIsRecordedUntilAClockThatStartsInThePastIsSet)
+{
+    add({sensorOf("a", 1)}, 0);
+    const Slot newest = history.newest();
+    SensorHistory::Entries stored;
+    stored["a:/chip/a"] =
+        std::make_unique<SensorHistory::Entry>(*history.entryUntil("a:/chip/a", newest));
+    history.restore(std::move(stored), newest);
+    add({sensorOf("a", 2)}, -start);
+    EXPECT_EQ(history.newest(), newest);
+    add({sensorOf("a", 3)}, 20);
+    EXPECT_EQ(last(hour("a")["values"], 3), json::parse("[1, null, 3]"));
+    add({sensorOf("a", 4)}, -start);
+    EXPECT_EQ(hour("a")["states"], json::parse(R"([[null, 359], ["Normal", 1]])"));
+}
+
+TEST_F(SensorHistoryTest, MeanIsThatOfTheReadingsAfterTheClockWasSetBack)
+{
+    for (int i = 0; i < 9; ++i)
+        add({sensorOf("a", 100)}, 10 * i);
+    add({sensorOf("a", 10)}, 30);
+    EXPECT_EQ(day("a")["mean"].back(), 10);
+}
+
+TEST_F(SensorHistoryTest, GreatReadingsAreKeptAsTheGreatestNumber)
+{
+    Sensor sensor = sensorOf("a", 1);
+    sensor.reading->modifier = 300;
+    add({sensor}, 0);
+    EXPECT_GT(hour("a")["values"].back(), 3e38);
+}
+
 TEST_F(SensorHistoryTest, StatesHaveNumbersOfTheirOwn)
 {
     for (unsigned number = 1; number <= greatestStateNumber; ++number)
@@ -268,6 +328,8 @@ TEST_F(HistoryFileTest, DamagedFileIsRefusedAndChangesNothing)
     EXPECT_THAT(problem(flipped), HasSubstr("history: it is damaged or truncated"));
     EXPECT_THAT(
         problem(content.substr(0, content.size() / 2)), HasSubstr("it is damaged or truncated"));
+    EXPECT_THAT(
+        problem(content.substr(0, content.size() - 1)), HasSubstr("it is damaged or truncated"));
     EXPECT_THAT(problem(""), HasSubstr("it is damaged or truncated"));
     EXPECT_THAT(problem("no history at all, but long enough for a header"),
         HasSubstr("it is of another version"));
@@ -299,7 +361,53 @@ TEST_F(HistoryFileTest, ImpossibleNumbersAreRefused)
 TEST_F(HistoryFileTest, FailureToWriteNamesTheFile)
 {
     EXPECT_THAT(Testing::errorOf([&] { writeHistoryFile("/proc/none/history", history); }),
-        HasSubstr("/proc/none/history: "));
+        HasSubstr("/proc/none/history.new: "));
+}
+
+TEST_F(HistoryFileTest, OnlyRegularFilesAreUsed)
+{
+    ASSERT_EQ(::mkfifo(file.c_str(), 0600), 0);
+    EXPECT_THAT(Testing::errorOf([&] { readHistoryFile(file, history); }),
+        HasSubstr("it is no regular file"));
+    const std::string target = folder.write("target", "kept");
+    ASSERT_EQ(::symlink(target.c_str(), (file + ".new").c_str()), 0);
+    EXPECT_NE(Testing::errorOf([&] { writeHistoryFile(file, history); }), "");
+    EXPECT_EQ(Testing::contentOf(target), "kept");
+}
+
+TEST_F(HistoryFileTest, KeeperWritesAtIntervalsAndAtTheEnd)
+{
+    SensorHistory restored;
+    {
+        const HistoryKeeper keeper(history, folder.path().string(), std::chrono::milliseconds(10));
+        EXPECT_TRUE(Testing::waitUntil([&] { return std::filesystem::exists(file); }));
+        readHistoryFile(file, restored);
+        EXPECT_EQ(restored.newest(), history.newest());
+    }
+    std::filesystem::remove(file);
+    {
+        const HistoryKeeper keeper(history, folder.path().string());
+    }
+    EXPECT_TRUE(std::filesystem::exists(file));
+}
+
+TEST_F(HistoryFileTest, KeeperKeepsAFileOfSomethingElse)
+{
+    folder.write("history", "a list of kings");
+    {
+        const HistoryKeeper keeper(history, folder.path().string());
+    }
+    EXPECT_EQ(Testing::contentOf(file + ".bad"), "a list of kings");
+    EXPECT_THAT(Testing::contentOf(file), testing::StartsWith("\x1f\x8b"));
+}
+
+TEST_F(HistoryFileTest, FolderHasOneKeeper)
+{
+    const HistoryKeeper keeper(history, folder.path().string());
+    SensorHistory other;
+    EXPECT_THAT(
+        Testing::errorOf([&] { const HistoryKeeper second(other, folder.path().string()); }),
+        HasSubstr("another process keeps its history there"));
 }
 
 } // namespace SensorHistoryTests

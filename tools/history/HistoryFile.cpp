@@ -2,15 +2,15 @@
 
 #include "tools/history/HistoryFile.h"
 
-#include "tools/output/FileReplacement.h"
-
 #include <fcntl.h>
+#include <sys/stat.h>
 #include <unistd.h>
 #include <zlib.h>
 
 #include <array>
 #include <cerrno>
 #include <cstdint>
+#include <cstdio>
 #include <stdexcept>
 #include <system_error>
 #include <type_traits>
@@ -45,15 +45,36 @@ void require(bool condition, const char* otherwise)
         throw std::runtime_error(otherwise);
 }
 
+[[noreturn]] void throwSystemError(int number = errno)
+{
+    throw std::system_error(number, std::generic_category());
+}
+
+// Opens a regular file that is no symbolic link. Returns -1 where there is none.
+int openRegular(const std::string& file, int flags)
+{
+    constexpr int careful = O_NOFOLLOW | O_NONBLOCK | O_CLOEXEC; // a FIFO would block
+    const int descriptor = ::open(file.c_str(), flags | careful, modeOfFile);
+    if (descriptor == -1 && errno != ENOENT)
+        throwSystemError();
+    struct stat status {};
+    if (descriptor != -1 && (::fstat(descriptor, &status) != 0 || !S_ISREG(status.st_mode))) {
+        ::close(descriptor);
+        throw std::runtime_error("it is no regular file");
+    }
+    return descriptor;
+}
+
 class Gzip {
 public:
     // Owns the descriptor from now on.
-    Gzip(int descriptor, const char* mode) : file_(::gzdopen(descriptor, mode))
+    Gzip(int descriptor, const char* mode)
+        : descriptor_(descriptor), file_(::gzdopen(descriptor, mode))
     {
         if (file_ != nullptr)
             return;
         ::close(descriptor);
-        throw std::system_error(errno, std::generic_category());
+        throwSystemError(ENOMEM);
     }
     ~Gzip()
     {
@@ -66,27 +87,37 @@ public:
     void write(const void* bytes, std::size_t count)
     {
         if (::gzwrite(file_, bytes, static_cast<unsigned>(count)) == 0)
-            throw std::system_error(errno, std::generic_category());
+            throwSystemError();
     }
-    // Writes the checksum.
+    // Writes the checksum and has the file on the disk.
     void finish()
     {
-        if (::gzclose(std::exchange(file_, nullptr)) != Z_OK)
-            throw std::system_error(errno, std::generic_category());
+        const int copy = ::fcntl(descriptor_, F_DUPFD_CLOEXEC, 0);
+        if (copy == -1)
+            throwSystemError();
+        const int result = ::gzclose(std::exchange(file_, nullptr));
+        const int synchronized = ::fsync(copy);
+        const int number = result == Z_ERRNO || result == Z_OK ? errno : ENOMEM;
+        ::close(copy);
+        if (result != Z_OK || synchronized != 0)
+            throwSystemError(number);
     }
 
     bool read(void* bytes, std::size_t count)
     {
         return ::gzread(file_, bytes, static_cast<unsigned>(count)) == static_cast<int>(count);
     }
-    // Returns whether all was read and has the right checksum.
-    bool isAtEnd()
+    // Returns whether all was read and has the right checksum. REQUIRES: nothing else is called
+    // afterwards.
+    bool closeAtEnd()
     {
         char next = 0;
-        return ::gzread(file_, &next, 1) == 0 && ::gzdirect(file_) == 0;
+        const bool isAtEnd = ::gzread(file_, &next, 1) == 0 && ::gzdirect(file_) == 0;
+        return ::gzclose(std::exchange(file_, nullptr)) == Z_OK && isAtEnd;
     }
 
 private:
+    int descriptor_;
     ::gzFile file_;
 };
 
@@ -144,28 +175,37 @@ StoredHistory parseHistory(const std::function<bool(void* bytes, std::size_t cou
 
 void writeHistoryFile(const std::string& file, const SensorHistory& history)
 {
-    const auto write = [&](int descriptor) {
-        Gzip gzip(::dup(descriptor), "wb1"); // fast: higher levels save little
+    const std::string newFile = file + ".new";
+    try {
+        const int descriptor = openRegular(newFile, O_WRONLY | O_CREAT | O_TRUNC);
+        if (descriptor == -1)
+            throwSystemError(ENOENT);
+        Gzip gzip(descriptor, "wb1"); // fast: higher levels save little
         storeHistory(
             history, [&](const void* bytes, std::size_t count) { gzip.write(bytes, count); });
         gzip.finish();
-    };
-    replaceFile(file, write, modeOfFile);
+        if (::rename(newFile.c_str(), file.c_str()) != 0)
+            throwSystemError();
+    } catch (const std::system_error& error) {
+        throw std::runtime_error(newFile + ": " + error.code().message());
+    } catch (const std::runtime_error& error) {
+        throw std::runtime_error(newFile + ": " + error.what());
+    }
 }
 
 void readHistoryFile(const std::string& file, SensorHistory& history)
 {
-    const int descriptor = ::open(file.c_str(), O_RDONLY | O_CLOEXEC);
-    if (descriptor == -1 && errno == ENOENT)
-        return;
-    if (descriptor == -1)
-        throw std::runtime_error(file + ": " + std::generic_category().message(errno));
     try {
+        const int descriptor = openRegular(file, O_RDONLY);
+        if (descriptor == -1)
+            return;
         Gzip gzip(descriptor, "rb");
         auto [entries, newest] =
             parseHistory([&](void* bytes, std::size_t count) { return gzip.read(bytes, count); });
-        require(gzip.isAtEnd(), damaged);
+        require(gzip.closeAtEnd(), damaged);
         history.restore(std::move(entries), newest);
+    } catch (const std::system_error& error) {
+        throw std::runtime_error(file + ": " + error.code().message());
     } catch (const std::runtime_error& error) {
         throw std::runtime_error(file + ": " + error.what());
     }

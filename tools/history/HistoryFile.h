@@ -10,7 +10,8 @@
 
 namespace Tools {
 
-// Writes what is needed to restore the history, piece by piece. It need not stop meanwhile.
+// Writes what is needed to restore the history, piece by piece. Samples may be added meanwhile:
+// each sensor is written as it was when the call began.
 void storeHistory(const SensorHistory& history,
     const std::function<void(const void* bytes, std::size_t count)>& write);
 
@@ -23,10 +24,13 @@ struct StoredHistory {
 // std::runtime_error with the reason where the bytes are malformed.
 StoredHistory parseHistory(const std::function<bool(void* bytes, std::size_t count)>& read);
 
-// Do the same with a file, which is compressed and has a checksum (RFC 1952). Both throw
-// std::runtime_error with the file and the reason. Where that fails, and where there is no file to
-// read, nothing is changed.
+// Replaces the file by one with the history, compressed and with a checksum (RFC 1952). The new
+// file is FILE.new until it is complete. Throws std::runtime_error with the file and the reason.
+// REQUIRES: no other process does so with the same file.
 void writeHistoryFile(const std::string& file, const SensorHistory& history);
+
+// Restores the history from such a file. Changes nothing where there is none. Throws
+// std::runtime_error with the file and the reason where it cannot be read or is malformed.
 void readHistoryFile(const std::string& file, SensorHistory& history);
 
 } // namespace Tools

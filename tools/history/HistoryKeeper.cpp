@@ -5,10 +5,12 @@
 #include "host/http/EventLog.h"
 #include "tools/history/HistoryFile.h"
 
+#include <fcntl.h>
+#include <sys/file.h>
 #include <unistd.h>
 
 #include <cerrno>
-#include <chrono>
+#include <cstdio>
 #include <stdexcept>
 #include <system_error>
 #include <utility>
@@ -19,32 +21,57 @@ namespace {
 
 using Host::Http::report;
 
-constexpr std::chrono::minutes interval{5};
-
-void requireWritable(const std::string& folder)
+[[noreturn]] void refuse(const std::string& folder, const std::string& reason)
 {
-    if (::access(folder.c_str(), W_OK | X_OK) != 0)
-        throw std::runtime_error(
-            "cannot keep the history in " + folder + ": " + std::generic_category().message(errno));
+    throw std::runtime_error("cannot keep the history in " + folder + ": " + reason);
 }
 
 } // namespace
 
-HistoryKeeper::HistoryKeeper(SensorHistory& history, const std::string& folder)
-    : history_(history), file_(folder + "/history")
+HistoryKeeper::LockedFolder::LockedFolder(const std::string& folder)
+    : descriptor_(::open(folder.c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC))
 {
-    requireWritable(folder);
-    try {
-        readHistoryFile(file_, history_);
-    } catch (const std::exception& error) {
-        report({"HistoryKeeper", "HistoryKeeper", __LINE__},
-            std::string("the history begins anew: ") + error.what());
+    if (descriptor_ == -1 || ::access(folder.c_str(), W_OK | X_OK) != 0) {
+        const int number = errno;
+        if (descriptor_ != -1)
+            ::close(descriptor_);
+        refuse(folder, std::generic_category().message(number));
     }
-    thread_ = std::jthread([this](const std::stop_token& stop) {
+    if (::flock(descriptor_, LOCK_EX | LOCK_NB) != 0) {
+        ::close(descriptor_);
+        refuse(folder, "another process keeps its history there");
+    }
+}
+
+HistoryKeeper::LockedFolder::~LockedFolder()
+{
+    ::close(descriptor_);
+}
+
+HistoryKeeper::HistoryKeeper(
+    SensorHistory& history, const std::string& folder, std::chrono::milliseconds interval)
+    : folder_(folder), history_(history), file_(folder + "/history")
+{
+    read();
+    thread_ = std::jthread([this, interval](const std::stop_token& stop) {
         std::unique_lock lock(mutex_);
         while (!stopped_.wait_for(lock, stop, interval, [&] { return stop.stop_requested(); }))
             write();
     });
+}
+
+// A file of something else, or of another version, is not lost.
+void HistoryKeeper::read()
+{
+    try {
+        readHistoryFile(file_, history_);
+    } catch (const std::exception& error) {
+        const std::string kept = file_ + ".bad";
+        const bool isKept = ::rename(file_.c_str(), kept.c_str()) == 0;
+        report({"read", "HistoryKeeper", __LINE__}, std::string("the history begins anew: ") +
+                                                        error.what() +
+                                                        (isKept ? "; it is kept as " + kept : ""));
+    }
 }
 
 HistoryKeeper::~HistoryKeeper()

@@ -18,6 +18,12 @@ std::size_t placeOf(Slot time, Slot size)
     return static_cast<std::size_t>((time % size + size) % size);
 }
 
+float nearestFloat(double number)
+{
+    constexpr double greatest = std::numeric_limits<float>::max();
+    return static_cast<float>(std::clamp(number, -greatest, greatest));
+}
+
 } // namespace
 
 unsigned moreUrgent(unsigned earlier, unsigned later)
@@ -39,7 +45,7 @@ Samples::Samples()
 void Samples::add(Slot slot, const Sensor& sensor)
 {
     const auto state = static_cast<std::uint8_t>(numberOf(sensor.state));
-    const float value = sensor.reading ? static_cast<float>(sensor.reading->number()) : absent;
+    const float value = sensor.reading ? nearestFloat(sensor.reading->number()) : absent;
     const auto place = placeOf(slot, slotsKept);
     values_.at(place) = value;
     states_.at(place) = state;

@@ -49,7 +49,7 @@ public:
 
     // Adds a sample to the slot and to its minute, the newest ones.
     void add(Slot slot, const Sensor& sensor);
-    // Have nothing recorded there.
+    // Remove the sample of that time.
     void clearSlot(Slot slot);
     void clearMinute(Slot minute);
 
@@ -57,7 +57,7 @@ public:
     OfSlot ofSlot(Slot slot) const;
     OfMinute ofMinute(Slot minute) const;
 
-    // Returns whether add() can have made it.
+    // Returns whether all states are known: those that were read from a file may be others.
     bool isValid() const;
 
 private:

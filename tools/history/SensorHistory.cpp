@@ -11,6 +11,8 @@ namespace Tools {
 namespace {
 
 constexpr Slot slotsUntilForgotten = Samples::minutesKept * slotsOfMinute;
+constexpr Slot slotsOfDelay = 5 * slotsOfMinute;
+constexpr std::chrono::hours clockTimeout{1};
 
 // Clears the slots after the first one until the last one, and their minutes.
 void clearBetween(Samples& samples, Slot first, Slot last)
@@ -36,12 +38,18 @@ void SensorHistory::add(
 {
     const Slot slot = slotOf(now);
     const std::unique_lock lock(mutex_);
+    if (awaitsClock(slot))
+        return;
     advanceTo(slot);
     present_.clear();
+    for (const Sensor* const sensor : sensors) // before others are forgotten
+        if (const auto known = entries_.find(sensor->deviceId); known != entries_.end())
+            known->second->lastSeen = slot;
+    const std::size_t maximum = std::min(maximumSensors, 2 * sensors.size() + 100);
     for (const Sensor* const sensor : sensors) {
         auto found = entries_.find(sensor->deviceId);
         if (found == entries_.end()) {
-            if (entries_.size() >= maximumSensors)
+            if (!makeRoom(maximum, slot))
                 continue;
             found = entries_.emplace(sensor->deviceId, std::make_unique<Entry>()).first;
         }
@@ -51,11 +59,38 @@ void SensorHistory::add(
     }
 }
 
-// Makes room for samples of the slot.
+bool SensorHistory::awaitsClock(Slot slot)
+{
+    const bool isBehind = slot < newest_ - slotsOfDelay;
+    if (!isBehind)
+        clockAwaited_ = {};
+    return isBehind && std::chrono::steady_clock::now() < clockAwaited_;
+}
+
+// Forgets the sensor that is gone for the longest time where there are as many as the maximum.
+// Returns false where none is gone.
+bool SensorHistory::makeRoom(std::size_t maximum, Slot slot)
+{
+    if (entries_.size() < maximum)
+        return true;
+    const auto oldest =
+        std::min_element(entries_.begin(), entries_.end(), [](const auto& one, const auto& other) {
+            return one.second->lastSeen < other.second->lastSeen;
+        });
+    if (oldest->second->lastSeen == slot)
+        return false;
+    entries_.erase(oldest);
+    return true;
+}
+
+// Clears what is between the newest slot and this one; where the clock was set back, also the
+// minute of this one, whose readings are no longer counted.
 void SensorHistory::advanceTo(Slot slot)
 {
     for (auto& [deviceId, entry] : entries_) {
         clearBetween(entry->samples, std::min(slot, newest_), std::max(slot, newest_));
+        if (slot < newest_)
+            entry->samples.clearMinute(minuteOf(slot));
         entry->lastSeen = std::min(entry->lastSeen, slot);
     }
     newest_ = slot;
@@ -97,6 +132,7 @@ void SensorHistory::restore(Entries entries, Slot newest)
     entries_ = std::move(entries);
     present_.clear();
     newest_ = newest;
+    clockAwaited_ = std::chrono::steady_clock::now() + clockTimeout;
 }
 
 } // namespace Tools

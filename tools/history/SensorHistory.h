@@ -20,29 +20,35 @@ namespace Tools {
 // time between. Where it is set back, what was recorded of later times is discarded.
 class SensorHistory {
 public:
-    // Of further sensors nothing is recorded.
+    // Of further sensors nothing is recorded. Sensors that are gone are forgotten where there are
+    // as many as sensors that are there, and a hundred.
     static constexpr std::size_t maximumSensors = 10'000;
 
     static Slot slotOf(std::chrono::system_clock::time_point time);
 
     // Records the sensors, which are in the order of a list. Forgets those that were not among them
-    // for a day.
+    // for a day. Records nothing for an hour after restore() while the clock is more than five
+    // minutes behind what was restored: a machine whose clock has no battery starts in the past.
     void add(const std::vector<const Sensor*>& sensors, std::chrono::system_clock::time_point now);
 
     // The last slot of which samples were recorded; 0 where there are none.
     Slot newest() const;
 
-    // Calls a function with the samples of the sensor and newest(). Returns false where there are
-    // no such samples. The function must not call this object.
+    // Calls a function with the identifier and the samples of each sensor, which are empty where
+    // nothing was recorded, and with newest(). Returns false where nothing was recorded of any. The
+    // function must not call this object.
     template <typename Visitor>
-    bool visit(const std::string& deviceId, const Visitor& visitor) const
+    bool visit(const std::vector<std::string>& deviceIds, const Visitor& visitor) const
     {
         const std::shared_lock lock(mutex_);
-        const auto found = entries_.find(deviceId);
-        if (found == entries_.end())
-            return false;
-        visitor(found->second->samples, newest_);
-        return true;
+        const Samples none;
+        bool isAnyFound = false;
+        for (const std::string& deviceId : deviceIds) {
+            const auto found = entries_.find(deviceId);
+            isAnyFound = isAnyFound || found != entries_.end();
+            visitor(deviceId, found == entries_.end() ? none : found->second->samples, newest_);
+        }
+        return isAnyFound;
     }
     // Calls a function with the identifier and the samples of each sensor that was among the last
     // ones, in the order of a list, and with newest().
@@ -67,12 +73,15 @@ public:
     void restore(Entries entries, Slot newest);
 
 private:
+    bool awaitsClock(Slot slot);
     void advanceTo(Slot slot);
+    bool makeRoom(std::size_t maximum, Slot slot);
 
     mutable std::shared_mutex mutex_;
     Entries entries_;
     std::vector<Entries::const_iterator> present_;
     Slot newest_ = 0;
+    std::chrono::steady_clock::time_point clockAwaited_{}; // until then
 };
 
 } // namespace Tools

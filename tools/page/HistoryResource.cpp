@@ -89,10 +89,8 @@ std::string historyOf(const SensorHistory& history, const Query& query)
     };
     if (query.devices.empty())
         history.visitPresent(visit);
-    for (const std::string& device : query.devices)
-        if (!history.visit(device,
-                [&](const Samples& samples, Slot newest) { visit(device, samples, newest); }))
-            throw Problem(404, "nothing was recorded of one of the devices");
+    else if (!history.visit(query.devices, visit))
+        throw Problem(404, "nothing was recorded of the devices");
 
     const bool isOfMinutes = query.span == "day" || query.isThinned;
     const Slot endOfMinutes = (minuteOf(end - 1) + 1) * secondsOfMinute;
