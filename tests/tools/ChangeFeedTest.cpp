@@ -110,6 +110,26 @@ TEST_F(ChangeFeedTest, StreamThatIsNotReadEnds)
     EXPECT_TRUE(feed.hasSubscribers());
 }
 
+TEST_F(ChangeFeedTest, HeartbeatsFollowWhileTheSensorsAreRead)
+{
+    ChangeFeed quick(std::chrono::milliseconds(200));
+    const auto stream = quick.subscribe();
+    quick.publish({}, 1000);
+    EXPECT_EQ(next(*stream).name, "sensors");
+    std::jthread publisher([&] {
+        for (int i = 0; i < 6; ++i) {
+            std::this_thread::sleep_for(std::chrono::milliseconds(50));
+            quick.publish({}, 1000);
+        }
+    });
+    const Event heartbeat = next(*stream);
+    EXPECT_EQ(heartbeat.name, "alive");
+    EXPECT_GT(heartbeat.data["time"], 1'000'000'000);
+    publisher.join();
+    while (const auto more = stream->next())
+        EXPECT_TRUE(more->starts_with("event: alive"));
+}
+
 TEST_F(ChangeFeedTest, EndEndsTheWaitForAnEvent)
 {
     const auto stream = feed.subscribe();

@@ -4,7 +4,6 @@
 
 #include "tools/output/JsonText.h"
 #include "tools/output/SensorJson.h"
-#include "tools/page/Sampler.h"
 
 #include <deque>
 #include <string_view>
@@ -14,9 +13,6 @@
 namespace Tools {
 
 namespace {
-
-// Clients that receive nothing for longer conclude that the connection is lost.
-constexpr std::chrono::seconds signOfLifeInterval{15};
 
 // Events of a stream that its client has yet to fetch.
 constexpr std::size_t maximumPending = 8;
@@ -28,7 +24,7 @@ std::shared_ptr<const std::string> eventOf(std::string_view name, std::string_vi
     return event;
 }
 
-std::shared_ptr<const std::string> signOfLife()
+std::shared_ptr<const std::string> heartbeat()
 {
     return eventOf("alive", "{\"time\": " + std::to_string(std::time(nullptr)) + "}");
 }
@@ -50,10 +46,10 @@ public:
     {
         std::unique_lock lock(feed_.mutex_);
         const auto isReady = [this] { return isOver_ || !pending_.empty(); };
-        if (isNew_) // a sign of life must not come first
+        if (isNew_) // a heartbeat must not come first
             feed_.changed_.wait(lock, isReady);
-        else if (!feed_.changed_.wait_for(lock, signOfLifeInterval, isReady))
-            return signOfLife();
+        else if (!feed_.changed_.wait_for(lock, feed_.heartbeatInterval_, isReady))
+            return feed_.isPublishedWithin(feed_.heartbeatInterval_) ? heartbeat() : nullptr;
         if (isOver_)
             return nullptr;
         Event event = std::move(pending_.front());
@@ -92,13 +88,12 @@ std::unique_ptr<Host::Http::Stream> ChangeFeed::subscribe()
 {
     auto subscription = std::make_unique<Subscription>(*this);
     const std::lock_guard lock(mutex_);
-    const bool isListNew = Clock::now() < published_ + Sampler::livePeriod;
-    if (isListNew)
+    if (isPublishedWithin(period))
         subscription->add(listEvent());
-    if (!isListNew || subscriptions_.empty()) {
+    else
         isAwaited_ = true;
-        changed_.notify_all();
-    }
+    hasBegun_ = true;
+    changed_.notify_all();
     subscriptions_.insert(subscription.get());
     return subscription;
 }
@@ -109,11 +104,17 @@ bool ChangeFeed::hasSubscribers() const
     return !subscriptions_.empty();
 }
 
-void ChangeFeed::waitUntil(Clock::time_point time, const std::stop_token& stop)
+bool ChangeFeed::isPublishedWithin(std::chrono::milliseconds time) const
+{
+    return published_ && Clock::now() - *published_ < time;
+}
+
+bool ChangeFeed::waitUntil(Clock::time_point time, const std::stop_token& stop)
 {
     std::unique_lock lock(mutex_);
-    changed_.wait_until(lock, stop, time, [this] { return isAwaited_; });
-    isAwaited_ = false;
+    changed_.wait_until(lock, stop, time, [this] { return isAwaited_ || hasBegun_; });
+    hasBegun_ = false;
+    return std::exchange(isAwaited_, false);
 }
 
 void ChangeFeed::publish(const std::vector<const Sensor*>& sensors, std::time_t time)
@@ -130,6 +131,7 @@ void ChangeFeed::publish(const std::vector<const Sensor*>& sensors, std::time_t 
     if (changes)
         list_ = nullptr;
     published_ = Clock::now();
+    isAwaited_ = false;
     for (Subscription* const each : subscriptions_)
         if (each->isNew())
             each->add(listEvent());

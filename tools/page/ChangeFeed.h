@@ -11,6 +11,7 @@
 #include <ctime>
 #include <memory>
 #include <mutex>
+#include <optional>
 #include <set>
 #include <stop_token>
 #include <string>
@@ -18,20 +19,31 @@
 
 namespace Tools {
 
-// Has the sensors and their changes sent to all that follow them, as server-sent events
+// Publishes the sensors and their changes as server-sent events
 // (https://html.spec.whatwg.org/multipage/server-sent-events.html). Thread-safe.
 class ChangeFeed {
 public:
     using Clock = std::chrono::steady_clock;
 
-    // Creates a stream whose first event is the list of the sensors. One that the client fetches
-    // too slowly ends. The feed must outlive it.
+    // How often the sensors are published while somebody follows them.
+    static constexpr std::chrono::seconds period{2};
+
+    // A stream without changes has a heartbeat at these intervals, by which its client knows that
+    // the sensors are still read.
+    explicit ChangeFeed(std::chrono::milliseconds heartbeatInterval = std::chrono::seconds(15))
+        : heartbeatInterval_(heartbeatInterval)
+    {
+    }
+
+    // Creates a stream whose first event is the list of the sensors. It ends where the client
+    // fetches it too slowly, and where nothing was published between two heartbeats. The feed must
+    // outlive it.
     std::unique_ptr<Host::Http::Stream> subscribe();
     bool hasSubscribers() const;
 
-    // Blocks until the time, but no longer than until a stop is requested or the sensors have to be
-    // published for a new stream.
-    void waitUntil(Clock::time_point time, const std::stop_token& stop);
+    // Blocks until the time, until a stop is requested, or until somebody subscribes. Returns
+    // whether the sensors have to be published for a new stream.
+    bool waitUntil(Clock::time_point time, const std::stop_token& stop);
 
     // Sends what has changed since the last call, and the list to new streams. The sensors are in
     // the order of a list.
@@ -46,16 +58,19 @@ private:
     };
 
     // These require that the mutex is held.
+    bool isPublishedWithin(std::chrono::milliseconds time) const;
     Event listEvent();
     Event changesSince(const std::vector<Known>& before, std::time_t time) const;
 
+    const std::chrono::milliseconds heartbeatInterval_;
     mutable std::mutex mutex_;
     std::condition_variable_any changed_;
     std::set<Subscription*> subscriptions_;
     std::vector<Known> known_; // what was published last
     Event list_;               // of it, made when it is needed
-    Clock::time_point published_ = Clock::time_point::min();
+    std::optional<Clock::time_point> published_;
     bool isAwaited_ = false; // whether publish() has to be called soon
+    bool hasBegun_ = false;  // whether somebody has subscribed since the last waitUntil()
 };
 
 } // namespace Tools

@@ -40,20 +40,22 @@ void Sampler::run(const std::stop_token& stop)
     if (history_ != nullptr)
         sample();
     for (;;) {
-        feed_.waitUntil(nextTime(), stop);
+        const auto next = nextTime();
+        const bool isAwaited = feed_.waitUntil(next, stop);
         if (stop.stop_requested())
             return;
-        sample();
+        if (isAwaited || SteadyClock::now() >= next)
+            sample();
     }
 }
 
-// Without subscribers and history, the time is one at which nothing is lost by a sample.
+// Without subscribers and history, a sample once in a day has no user and does no harm.
 SteadyClock::time_point Sampler::nextTime() const
 {
     const auto now = SteadyClock::now();
     auto next = now + std::chrono::hours(24);
     if (feed_.hasSubscribers())
-        next = sampled_ + livePeriod;
+        next = sampled_ + ChangeFeed::period;
     if (history_ != nullptr) {
         constexpr std::chrono::seconds slot{secondsOfSlot};
         next = std::min(next, now + slot - SystemClock::now().time_since_epoch() % slot);
@@ -63,6 +65,7 @@ SteadyClock::time_point Sampler::nextTime() const
 
 void Sampler::sample()
 {
+    sampled_ = SteadyClock::now();
     try {
         const auto harvest = harvests_.get();
         const auto sensors = inListOrder(harvest->sensors);
@@ -76,7 +79,6 @@ void Sampler::sample()
         Host::Http::report({"sample", "Sampler", __LINE__},
             std::string("the sensors were not read: ") + error.what());
     }
-    sampled_ = SteadyClock::now();
 }
 
 } // namespace Tools

@@ -15,12 +15,10 @@ namespace Tools {
 class ChangeFeed;
 class SensorHistory;
 
-// Reads the sensors on a thread of its own: every ten seconds for the history, and every two
-// seconds for the feed while somebody follows it.
+// Reads the sensors on a thread of its own: every ten seconds for the history, and in the feed's
+// period while somebody follows it.
 class Sampler {
 public:
-    static constexpr std::chrono::seconds livePeriod{2};
-
     // The history is null where none is kept. All must outlive it.
     Sampler(SingleFlight<Harvest>& harvests, ChangeFeed& feed, SensorHistory* history);
 
