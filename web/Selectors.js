@@ -2,52 +2,115 @@
 
 // Sensors by what users type into the search.
 
-/** Returns the names by which `sensorctl` selects the sensor. */
-export function namesOf(sensor) {
-    const label = sensor.label ?? '';
-    const path = sensor.deviceId.slice(label.length + 1);
-    const feature = path.slice(path.lastIndexOf('/') + 1);
-    return [sensor.chip, label, feature, path, sensor.deviceId, `${sensor.chip}/${label}`,
-        `${sensor.chip}/${feature}`];
+/** Returns text without letter case, which no comparison regards. */
+const folded = (text) => text.toLowerCase();
+
+/**
+ * Returns the names by which `sensorctl` selects the sensor, in lower case. The first is that of
+ * the chip.
+ */
+export function namesOf({ chip, label, deviceId }) {
+    const name = label ?? '';
+    const path = deviceId.startsWith(`${name}:`) ? deviceId.slice(name.length + 1) : deviceId;
+    const rest = path.replace(/^(\/hwmon)?\//, '');
+    const feature = rest.startsWith(`${chip}/`) ? rest.slice(chip.length + 1) : rest;
+    return [chip, name, feature, path, deviceId, `${chip}/${name}`, `${chip}/${feature}`]
+        .map(folded);
 }
 
-/** Returns text without the case of its ASCII letters, which are all that `sensorctl` folds. */
-const folded = (text) => text.replace(/[A-Z]+/g, (letters) => letters.toLowerCase());
+/** The character classes of POSIX, for characters in lower case. */
+const classes = {
+    alnum: /[a-z0-9]/, alpha: /[a-z]/, blank: /[ \t]/, cntrl: /[\0-\x1f\x7f]/, digit: /[0-9]/,
+    graph: /[!-~]/, lower: /[a-z]/, print: /[ -~]/, punct: /[!-/:-@[-`{-~]/, space: /\s/,
+    upper: /[a-z]/, xdigit: /[0-9a-f]/,
+};
 
-/** Returns the regular expression for a set that begins at `[`, and its end; null for no set. */
+/** Returns the test of the set of characters that begins at `[`, and its end; null for no set. */
 function setAt(pattern, begin) {
-    const end = pattern.indexOf(']', begin + (/^\[[!^]/.test(pattern.slice(begin)) ? 3 : 2));
-    if (end < 0)
-        return null;
-    const members = pattern.slice(begin + 1, end).replace(/^[!^]/, '');
-    const isNegated = members.length < end - begin - 1;
-    return { expression: `[${isNegated ? '^' : ''}${members.replace(/[\\\]^[&]/g, '\\$&')}]`, end };
-}
-
-/** Returns the regular expression that matches what fnmatch(3) does without any of its options. */
-export function expressionOf(pattern) {
-    const text = folded(pattern);
-    let expression = '';
-    for (let i = 0; i < text.length; ++i) {
-        const set = text[i] === '[' ? setAt(text, i) : null;
-        if (set) {
-            expression += set.expression;
-            i = set.end;
-        } else if (text[i] === '*') {
-            expression += '.*';
-        } else if (text[i] === '?') {
-            expression += '.';
+    const isNegated = pattern[begin + 1] === '!' || pattern[begin + 1] === '^';
+    const first = begin + (isNegated ? 2 : 1);
+    const tests = [];
+    let i = first;
+    while (i < pattern.length && (pattern[i] !== ']' || i === first)) {
+        const named = /^\[:([a-z]+):\]/.exec(pattern.slice(i, i + 10).join(''));
+        const [low, dash, high] = pattern.slice(i, i + 3);
+        if (named) {
+            tests.push((character) => classes[named[1]]?.test(character) ?? false);
+            i += named[0].length;
+        } else if (dash === '-' && high !== undefined && high !== ']') {
+            tests.push((character) => low <= character && character <= high);
+            i += 3;
         } else {
-            const character = String.fromCodePoint(text.codePointAt(i));
-            expression += character.replace(/[\\^$.*+?()[\]{}|/]/, '\\$&');
-            i += character.length - 1;
+            tests.push((character) => character === low);
+            ++i;
         }
     }
-    try {
-        return new RegExp(`^${expression}$`, 'su');
-    } catch {
-        return /^\b$/; // a range such as [z-a], which matches nothing
+    const test = (character) => tests.some((each) => each(character)) !== isNegated;
+    return i < pattern.length ? { test, end: i } : null;
+}
+
+const star = null;
+
+/** Returns a test for each character that the pattern matches, and `star`. */
+function elementsOf(text) {
+    const pattern = [...text];
+    const elements = [];
+    for (let i = 0; i < pattern.length; ++i) {
+        const expected = pattern[i];
+        const set = expected === '[' ? setAt(pattern, i) : null;
+        if (set) {
+            elements.push(set.test);
+            i = set.end;
+        } else if (expected === '*') {
+            elements.push(star);
+        } else if (expected === '?') {
+            elements.push(() => true);
+        } else {
+            elements.push((character) => character === expected);
+        }
     }
+    return elements;
+}
+
+/**
+ * Returns a function that says whether a name in lower case matches, as fnmatch(3) does with
+ * FNM_CASEFOLD and FNM_NOESCAPE. It goes back to the last `*` only, so that no pattern takes long.
+ */
+export function matcherOf(pattern) {
+    const elements = elementsOf(folded(pattern));
+    return (name) => {
+        const characters = [...name];
+        let element = 0;
+        let begin = -1; // of the elements after the last star
+        let next = 0; // the character from which they are tried again
+        for (let i = 0; i < characters.length;) {
+            if (elements[element] === star && element < elements.length) {
+                begin = ++element;
+                next = i;
+            } else if (elements[element]?.(characters[i])) {
+                ++element;
+                ++i;
+            } else if (begin >= 0) {
+                element = begin;
+                i = ++next;
+            } else {
+                return false;
+            }
+        }
+        return elements.slice(element).every((each) => each === star);
+    };
+}
+
+/** Returns the name of a chip with its address as libsensors compares it: without leading zeros. */
+const withPlainAddress = (chip) => chip.replace(/-(?:0x)?0*([0-9a-f]+)$/, '-$1');
+
+/** Returns a function that says whether `sensorctl` selects a sensor with these names. */
+export function selectorOf(text) {
+    const selector = folded(text);
+    const isPattern = /[*?[]/.test(selector);
+    const matches = isPattern ? matcherOf(selector) : (name) => name === selector;
+    return (names) => names.some(matches) ||
+        withPlainAddress(names[0]) === withPlainAddress(selector);
 }
 
 /** Returns the words of a text: what blanks separate, and what quotation marks hold together. */
@@ -57,20 +120,15 @@ function wordsOf(text) {
 
 /**
  * Returns a function that says whether a sensor is searched for: when `sensorctl` selects it by
- * one of the words, or when its names have all of the words as parts. Words such as `kind:fan`
+ * one of the words, or when each word is a part of one of its names. Words such as `kind:fan`
  * limit the sensors to those kinds.
  */
 export function searchFor(text) {
     const all = wordsOf(folded(text));
     const kinds = all.filter((word) => word.startsWith('kind:')).map((word) => word.slice(5));
     const words = all.filter((word) => !word.startsWith('kind:'));
-    const expressions = words.map(expressionOf);
-    return (sensor) => {
-        if (kinds.length > 0 && !kinds.includes(sensor.kind))
-            return false;
-        const names = namesOf(sensor).map(folded);
-        return words.length === 0 ||
-            expressions.some((expression) => names.some((name) => expression.test(name))) ||
-            words.every((word) => names.some((name) => name.includes(word)));
-    };
+    const selectors = words.map(selectorOf);
+    return ({ kind, names }) => (kinds.length === 0 || kinds.includes(kind)) &&
+        (words.length === 0 || selectors.some((selects) => selects(names)) ||
+            words.every((word) => names.some((name) => name.includes(word))));
 }

@@ -3,12 +3,14 @@
 """The search, its selectors and the address."""
 
 import ctypes
+import json
 import random
+import subprocess
 
 from selenium.webdriver.common.keys import Keys
 
 from browser import PageTest
-from served import demonstration
+from served import SENSORCTL, demonstration
 
 VISIBLE = ("[...document.querySelectorAll('.chips .sensor:not([hidden])')]"
            ".map(row => row.querySelector('button').textContent)")
@@ -18,6 +20,16 @@ class SearchTest(PageTest):
     def setUp(self):
         super().setUp()
         self.server = demonstration()
+
+    def selected(self, selector):
+        return self.driver.execute_async_script(
+            "const [selector, done] = arguments;"
+            "const rows = [...document.querySelectorAll('.chips .sensor')];"
+            "import('/web/Selectors.js').then(({namesOf, selectorOf}) => done(rows.filter(row =>"
+            "    selectorOf(selector)(namesOf({deviceId: row.dataset.device,"
+            "        label: row.querySelector('button').textContent,"
+            "        chip: row.closest('.chip').querySelector('.chip-title').textContent})))"
+            "    .map(row => row.querySelector('button').textContent)));", selector)
 
     def found(self, text):
         self.search(text)
@@ -38,6 +50,16 @@ class SearchTest(PageTest):
                 "nowhere": []}.items():
             with self.subTest(text):
                 self.assertEqual(labels, self.found(text))
+        # What follows has one word, which the terminal takes, too.
+        for selector in ("system/psu1", "PSU 1 FAN", "[pn]su[[:digit:]]", "*fan[!1-3]", "vbat", "*",
+                         "CPU 1 Package Temp:/system/cpu1/package", "/system/cpu?/*"):
+            with self.subTest(selector):
+                listed = subprocess.run(
+                    [SENSORCTL, "list", "--json", "--model", self.server.model, selector],
+                    capture_output=True, check=False).stdout
+                self.assertEqual({sensor["label"] for sensor in json.loads(listed)},
+                                 set(self.selected(selector)))
+        self.search("nowhere")
         self.assertEqual("Shown: 0", self.run_script("document.querySelector('#found').innerText"))
         self.assertTrue(self.driver.find_element("class name", "none").is_displayed())
         self.search("nvme 1")
@@ -69,13 +91,15 @@ class SearchTest(PageTest):
         cases = [("".join(picks.choices("ab-]/.B*?[!^\\(", k=picks.randint(1, 7))),
                   "".join(picks.choices("ab-]/.B\\(", k=picks.randint(0, 5)))) for _ in range(4000)]
         cases += [("[]]", "]"), ("[!]a]", "b"), ("[a-c]*", "b/x"), ("[", "["), ("[a", "[a"),
-                  ("*.*", "a.b"), ("a?", "ab"), ("[z-a]", "z"), ("[^a]", "b"), ("ä*", "äb")]
+                  ("*.*", "a.b"), ("a?", "ab"), ("[z-a]", "z"), ("[^a]", "b"), ("ä*", "äb"),
+                  ("[&]", "&"), ("fan[[:digit:]]", "fan1"), ("fan[![:digit:]]", "fan1"),
+                  ("[[:digit:]a]", "a"), ("[[:x:]]", "x"), ("*?" * 12 + "zz", "a" * 40)]
         expected = [library.fnmatch(pattern.encode(), name.encode(), no_escape | fold_case) == 0
                     for pattern, name in cases]
         actual = self.driver.execute_async_script(
             "const [cases, done] = arguments;"
-            "import('/web/Selectors.js').then(({expressionOf}) => done(cases.map("
-            "([pattern, name]) => expressionOf(pattern).test(name.toLowerCase()))));", cases)
+            "import('/web/Selectors.js').then(({matcherOf}) => done(cases.map("
+            "([pattern, name]) => matcherOf(pattern)(name.toLowerCase()))));", cases)
         self.assertGreater(sum(expected), 50)
         self.assertEqual([], [(case, isMatch) for case, isMatch, is_same in zip(
             cases, expected, map(bool.__eq__, expected, actual)) if not is_same])
