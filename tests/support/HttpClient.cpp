@@ -136,7 +136,7 @@ HttpReply HttpClient::receive()
     if (reply.field("transfer-encoding") == "chunked")
         reply.body = chunks();
     else
-        reply.body = exactly(std::stoul(reply.field("content-length")));
+        reply.body = reply.status == 304 ? "" : exactly(std::stoul(reply.field("content-length")));
     return reply;
 }
 

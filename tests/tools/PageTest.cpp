@@ -92,8 +92,8 @@ TEST_F(PageTest, TextsOfSensorsAreNoMarkup)
     EXPECT_THAT(page.body,
         HasSubstr("<bdi>&lt;script&gt;alert(&apos;1&apos;)&lt;/script&gt;&amp;&quot;\u202e</bdi>"));
     EXPECT_THAT(page.body, HasSubstr("<bdi>&lt;b&gt;</bdi>"));
-    EXPECT_THAT(page.body, HasSubstr("97 °C"));
-    EXPECT_THAT(page.body, HasSubstr("High critical 95"));
+    EXPECT_THAT(page.body, HasSubstr("97\u00a0°C"));
+    EXPECT_THAT(page.body, HasSubstr("High critical 95\u00a0°C"));
     EXPECT_THAT(page.body, Not(HasSubstr("<script>")));
 }
 
@@ -112,6 +112,19 @@ TEST_F(PageTest, NothingOfItIsFromElsewhere)
         421);
 }
 
+TEST_F(PageTest, AllOfItNeedsASignIn)
+{
+    const ServerProcess server(withModel({"--passwords", secret("passwords", userLine)}));
+    for (const char* const target :
+        {"/", "/web/Main.js", "/api/sensors", "/api/events", "/api/history?span=hour&points=60"}) {
+        const HttpReply reply = read(server, target);
+        EXPECT_EQ(reply.status, 401) << target;
+        EXPECT_NE(reply.field("www-authenticate"), "") << target;
+    }
+    EXPECT_EQ(read(server, "/", asAnn).status, 200);
+    EXPECT_EQ(read(server, "/web/Main.js", asAnn).status, 200);
+}
+
 TEST_F(PageTest, IsInThePreferredLanguage)
 {
     const ServerProcess server(withModel());
@@ -121,7 +134,7 @@ TEST_F(PageTest, IsInThePreferredLanguage)
         return page.body.substr(page.body.find("lang=\"") + 6, 2);
     };
     EXPECT_EQ(languageOf(""), "en");
-    EXPECT_EQ(languageOf("Accept-Language: de-AT, en;q=0.5\r\n"), "de");
+    EXPECT_EQ(languageOf("Accept-Language: DE-at, en;q=0.5\r\n"), "de");
     EXPECT_EQ(languageOf("Accept-Language: xx, fr;q=0.3, ja;q=0.4\r\n"), "ja");
     EXPECT_EQ(languageOf("Accept-Language: es;q=0\r\n"), "en");
 }
@@ -152,6 +165,8 @@ TEST_F(PageTest, FilesAreReadAgainOnlyWhenTheyHaveChanged)
     EXPECT_EQ(known.status, 304);
     EXPECT_EQ(known.body, "");
     EXPECT_EQ(known.field("etag"), plain.field("etag"));
+    EXPECT_THAT(
+        known.field("content-length"), testing::AnyOf("", std::to_string(plain.body.size())));
     EXPECT_EQ(read(server, "/web/Main.js", "If-None-Match: \"x\"\r\n").status, 200);
     EXPECT_EQ(
         read(server, "/web/Main.js", "Accept-Encoding: gzip;q=0\r\n").field("content-encoding"),
@@ -265,6 +280,7 @@ TEST_F(PageTest, DamagedHistoryIsReportedAndBeginsAnew)
     EXPECT_THAT(server.log(), HasSubstr("the history begins anew: "));
     EXPECT_EQ(server.end(SIGTERM).code, 0);
     EXPECT_THAT(contentOf((folder_.path() / "history").string()), testing::StartsWith("\x1f\x8b"));
+    EXPECT_EQ(contentOf((folder_.path() / "history.bad").string()), "damaged");
 }
 
 TEST_F(PageTest, FolderThatCannotBeWrittenIsRefused)

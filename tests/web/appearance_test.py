@@ -65,11 +65,13 @@ class AppearanceTest(PageTest):
                                      sorted(places.findall(texts[name])), (language, name))
 
     def test_uses_every_text(self):
-        sources = "".join(file.read_text() for pattern in ("*.js", "page.html")
-                          for file in (ROOT / "web").glob(pattern))
+        sources = "".join(file.read_text() for pattern in (
+            "web/*.js", "web/page.html", "tools/page/PageResource.cpp")
+            for file in ROOT.glob(pattern))
         for name, text in dictionary("en").items():
             if isinstance(text, str):
-                self.assertTrue(f"'{name}'" in sources or f"text.{name}}}" in sources, name)
+                self.assertTrue(any(
+                    form in sources for form in (f"'{name}'", f'"{name}"', f"text.{name}}}")), name)
 
     def test_knows_the_urgency_of_every_state(self):
         self.open(self.server)
@@ -90,6 +92,10 @@ class AppearanceTest(PageTest):
         self.assertFalse(self.driver.find_element("id", "search").is_displayed())
         self.assertIn("JavaScript", self.driver.find_element("tag name", "main").text)
         self.keep_screenshot("page-without-scripts")
+        self.look(has_scripts=False, language="de")
+        self.driver.get(self.server.address)
+        table = self.driver.find_element("id", "table").text
+        self.assertIn("2,61 V Warnung niedrig Untere Warngrenze 2,7 V", table)
 
     def test_prints_every_sensor_and_no_controls(self):
         self.open(self.server)

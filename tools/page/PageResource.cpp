@@ -2,6 +2,7 @@
 
 #include "tools/page/PageResource.h"
 
+#include "host/broker/Names.h"
 #include "host/http/ResourceCheck.h"
 #include "platform/utilities/ProviderUtilities.h"
 #include "tools/page/WebFiles.h"
@@ -9,6 +10,7 @@
 #include <kainjow/mustache.hpp>
 #include <nlohmann/json.hpp>
 
+#include <algorithm>
 #include <array>
 #include <stdexcept>
 #include <string_view>
@@ -34,6 +36,14 @@ std::string textIn(const Texts& texts, std::string_view name)
                                                       : std::string(name);
 }
 
+// Returns a number and its unit in the language of the texts.
+std::string quantityIn(const Texts& texts, std::string number, std::string_view unit)
+{
+    if (const std::size_t point = number.find('.'); point != std::string::npos)
+        number.replace(point, 1, textIn(texts, "decimalSign"));
+    return unit.empty() ? number : number.append("\u00a0").append(unit);
+}
+
 Data rowOf(const Sensor& sensor, const Texts& texts)
 {
     constexpr const char* noReading = "\u2013";
@@ -41,11 +51,12 @@ Data rowOf(const Sensor& sensor, const Texts& texts)
     for (std::size_t i = 0; i < limitKinds.size(); ++i)
         if (const auto& limit = sensor.limits.at(i))
             limits += (limits.empty() ? "" : ", ") +
-                      textIn(texts.at("limitNames"), limitKinds.at(i).member) + " " + limit->text();
+                      textIn(texts.at("limitNames"), limitKinds.at(i).member) + " " +
+                      quantityIn(texts, limit->text(), sensor.unit);
     Data row;
-    row.set("label", sensor.label);
+    row.set("label", sensor.label.empty() ? sensor.deviceId : sensor.label);
     row.set("reading",
-        sensor.reading ? sensor.reading->rounded() + " " + std::string(sensor.unit) : noReading);
+        sensor.reading ? quantityIn(texts, sensor.reading->rounded(), sensor.unit) : noReading);
     row.set("state", textIn(texts.at("states"), sensor.state.word));
     row.set("urgency", std::string(wordOf(sensor.state.urgency)));
     row.set("limits", limits);
@@ -146,13 +157,16 @@ Host::Http::Representation PageResource::represent(const Host::Http::RequestHead
     auto preferred = pages_.find(defaultLanguage);
     double greatest = 0;
     for (const auto& [range, weight] : Host::Http::weightedElements(head, "Accept-Language")) {
-        const auto found = pages_.find(range.substr(0, range.find('-')));
+        const std::string_view language = range.substr(0, range.find('-'));
+        const auto found = std::find_if(pages_.begin(), pages_.end(),
+            [&](const auto& each) { return Host::equalNames(each.first, language); });
         if (found != pages_.end() && weight > greatest) {
             greatest = weight;
             preferred = found;
         }
     }
-    auto fields = pageFields("text/html; charset=utf-8");
+    auto fields = pageFields("text/html; charset=utf-8", "no-store");
+    fields.push_back({"Content-Language", preferred->first});
     fields.push_back({"Vary", "Accept-Language"});
     return representationOf(preferred->second->get(), std::move(fields));
 }

@@ -25,7 +25,7 @@ std::string listOf(const Harvest& harvest)
 std::vector<Host::Http::HeaderField> apiFields(const char* contentType)
 {
     return {{"Content-Type", contentType}, {"Cache-Control", "no-store"},
-        {"X-Content-Type-Options", "nosniff"}};
+        {"Cross-Origin-Resource-Policy", "same-origin"}, {"X-Content-Type-Options", "nosniff"}};
 }
 
 SensorListResource::SensorListResource(

@@ -2,6 +2,7 @@
 
 #include "tools/page/WebFiles.h"
 
+#include "host/broker/Names.h"
 #include "host/http/ResourceCheck.h"
 
 #include <zlib.h>
@@ -61,7 +62,7 @@ bool acceptsGzip(const Host::Http::RequestHead& head)
 {
     const auto codings = Host::Http::weightedElements(head, "Accept-Encoding");
     return std::any_of(codings.begin(), codings.end(),
-        [](const auto& each) { return each.value == "gzip" && each.weight > 0; });
+        [](const auto& each) { return Host::equalNames(each.value, "gzip") && each.weight > 0; });
 }
 
 // Returns whether the client has what has the tag. The comparison is weak (RFC 9110, 8.8.3.2).
@@ -76,11 +77,11 @@ bool isKnown(const Host::Http::RequestHead& head, const std::string& entityTag)
 
 } // namespace
 
-std::vector<Host::Http::HeaderField> pageFields(const char* contentType)
+std::vector<Host::Http::HeaderField> pageFields(const char* contentType, const char* cacheControl)
 {
-    return {{"Content-Type", contentType}, {"Cache-Control", "no-cache"},
-        {"Content-Security-Policy", policy}, {"Referrer-Policy", "no-referrer"},
-        {"X-Content-Type-Options", "nosniff"}};
+    return {{"Content-Type", contentType}, {"Cache-Control", cacheControl},
+        {"Content-Security-Policy", policy}, {"Cross-Origin-Resource-Policy", "same-origin"},
+        {"Referrer-Policy", "no-referrer"}, {"X-Content-Type-Options", "nosniff"}};
 }
 
 FileResource::FileResource(const char* contentType, Form plain, Form compressed)
@@ -92,14 +93,13 @@ Host::Http::Representation FileResource::represent(const Host::Http::RequestHead
 {
     const bool isCompressed = compressed_.content && acceptsGzip(head);
     const Form& form = isCompressed ? compressed_ : plain_;
-    auto fields = pageFields(contentType_);
+    auto fields = pageFields(contentType_, "no-cache");
     fields.push_back({"ETag", form.entityTag});
     fields.push_back({"Vary", "Accept-Encoding"});
-    if (isKnown(head, form.entityTag))
-        return {std::move(fields), std::make_shared<const std::string>(), 304};
     if (isCompressed)
         fields.push_back({"Content-Encoding", "gzip"});
-    return {std::move(fields), form.content};
+    // The content, which is not sent with status 304, has the length that is (RFC 9110, 8.6).
+    return {std::move(fields), form.content, isKnown(head, form.entityTag) ? 304U : 200U};
 }
 
 WebFiles::WebFiles(const std::filesystem::path& folder)

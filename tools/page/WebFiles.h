@@ -54,6 +54,6 @@ private:
 
 // Returns the header fields of what browsers show: nothing of it, and nothing in it, is from
 // elsewhere (https://www.w3.org/TR/CSP3/).
-std::vector<Host::Http::HeaderField> pageFields(const char* contentType);
+std::vector<Host::Http::HeaderField> pageFields(const char* contentType, const char* cacheControl);
 
 } // namespace Tools
