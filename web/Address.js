@@ -35,7 +35,7 @@ export class Address extends EventTarget {
         const query = new URLSearchParams(location.search);
         this.search = query.get('search') ?? '';
         this.hasProblemsOnly = query.has('problems');
-        this.devices = query.getAll('device');
+        this.devices = [...new Set(query.getAll('device'))];
         this.span = query.get('span') === 'day' ? 'day' : 'hour';
     }
 
@@ -49,6 +49,7 @@ export class Address extends EventTarget {
             query.set('span', this.span);
         for (const device of this.devices)
             query.append('device', device);
-        return location.pathname + (query.size > 0 ? `?${query}` : '');
+        const text = query.toString();
+        return location.pathname + (text ? `?${text}` : '');
     }
 }

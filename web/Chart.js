@@ -9,10 +9,11 @@ import { axisTimeText, quantityText } from './Texts.js';
 /** The lines of sensors differ by color and by dashes. */
 export const dashes = [null, [7, 3], [2, 2], [9, 3, 2, 3], [4, 4], [12, 4]];
 export const mostSensors = dashes.length;
+const shortestWindow = 60_000; // in milliseconds
 export const seriesColor = (index) => styleValue(`--series-${index + 1}`);
 
 /**
- * Loads dygraphs, for the first chart. Its legend makes markup of labels and sets styles in a way
+ * Loads dygraphs, for the first chart. Its legend inserts labels as HTML and sets styles in a way
  * that the Content-Security-Policy forbids, so it is removed.
  */
 export async function loadDygraphs() {
@@ -41,6 +42,8 @@ export class Chart {
     #dygraph = null;
     #underlay = null;
     #shown = '';
+    #valueRange = []; // of the whole history
+    #isValueZoomed = false;
     #arguments = []; // of the last call of show()
 
     /** Calls `onPoint` with the row of the history that the pointer is at; with null for none. */
@@ -50,54 +53,75 @@ export class Chart {
     }
 
     /**
-     * Shows the history; the limits are those of `sensor`. A zoom is kept for the same sensors.
-     * Needs dygraphs.
+     * Shows the history of the sensors; the limits are those of the first. A zoom is kept for the
+     * same sensors. Needs dygraphs.
      */
-    show(history, sensor) {
-        this.#arguments = [history, sensor];
-        this.#underlay = { sensor, runsOfSensors: history.sensors.map(
+    show(history, sensors) {
+        this.#arguments = [history, sensors];
+        this.#underlay = { sensors, runsOfSensors: history.sensors.map(
             (each) => stateRunsOf(each, history)) };
         const labels = ['time', ...history.sensors.map((_, index) => `${index}`)];
         const shown = JSON.stringify([history.span, history.sensors.map((each) => each.deviceId)]);
-        const options = { file: rowsOf(history), valueRange: valueRangeOf(history, sensor) };
+        const file = rowsOf(history);
+        const valueRange = valueRangeOf(history, sensors[0]);
+        this.#valueRange = valueRange;
         if (this.#dygraph && shown === this.#shown) {
-            const isZoomed = this.#dygraph.isZoomed();
-            this.#dygraph.updateOptions(isZoomed ? { file: options.file } : options);
+            const dateWindow = this.#windowWithin(file);
+            this.#dygraph.updateOptions(
+                { file, ...dateWindow, ...(this.#isValueZoomed ? {} : { valueRange }) });
             return;
         }
         this.#shown = shown;
         this.remove();
-        this.#dygraph = new window.Dygraph(this.element, options.file, {
-            ...this.#fixedOptions(history), labels, valueRange: options.valueRange });
+        this.#dygraph = new window.Dygraph(this.element, file, {
+            ...this.#fixedOptions(history), labels, valueRange,
+            zoomCallback: (begin, end, [shownRange]) => {
+                this.#isValueZoomed = String(shownRange) !== String(this.#valueRange);
+            },
+        });
     }
 
-    /** Draws the chart anew, with the present colors of the style sheet. */
+    /** Redraws the chart in the present colors of the style sheet. */
     redraw() {
         if (!this.#dygraph)
             return;
+        const dateWindow = this.#dygraph.isZoomed('x') ? this.#dygraph.xAxisRange() : null;
         this.remove();
         this.show(...this.#arguments);
+        this.#dygraph.updateOptions({ dateWindow });
     }
 
     remove() {
         this.#dygraph?.destroy();
         this.#dygraph = null;
+        this.#isValueZoomed = false;
     }
 
-    /** Shows the part of the time that begins and ends at these parts of what is shown. */
+    /**
+     * Shows the part of the time that begins and ends at these parts of what is shown: within the
+     * history, at whose ends it keeps its length.
+     */
     zoom(begin, end) {
         if (!this.#dygraph)
             return;
         const [left, right] = this.#dygraph.xAxisRange();
         const [first, last] = this.#dygraph.xAxisExtremes();
-        const low = Math.max(first, left + begin * (right - left));
-        const high = Math.min(last, left + end * (right - left));
-        if (high - low >= 60_000)
-            this.#dygraph.updateOptions({ dateWindow: [low, high] });
+        const length = Math.min((end - begin) * (right - left), last - first);
+        const low = Math.min(Math.max(first, left + begin * (right - left)), last - length);
+        if (length >= shortestWindow)
+            this.#dygraph.updateOptions({ dateWindow: [low, low + length] });
     }
 
     showAll() {
         this.#dygraph?.resetZoom();
+    }
+
+    /** Returns the option that has a zoom follow a history that has left it behind. */
+    #windowWithin(rows) {
+        const [left, right] = this.#dygraph.xAxisRange();
+        const first = rows[0][0].getTime();
+        return this.#dygraph.isZoomed('x') && left < first
+            ? { dateWindow: [first, first + right - left] } : {};
     }
 
     #fixedOptions({ span, sensors }) {

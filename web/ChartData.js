@@ -4,13 +4,15 @@
 
 /**
  * Returns the answer of `/api/history` for these devices; null where there is no history of them.
- * Throws where there is no connection.
+ * Throws where the server does not answer.
  */
 export async function loadHistory(devices, span) {
     const query = new URLSearchParams({ span });
     for (const device of devices)
         query.append('device', device);
     const response = await fetch(`/api/history?${query}`);
+    if (!response.ok && response.status !== 404)
+        throw new Error(`/api/history: ${response.status}`);
     return response.ok ? response.json() : null;
 }
 

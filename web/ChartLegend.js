@@ -5,7 +5,7 @@
 import { dashes, seriesColor } from './Chart.js';
 import { rowsOf } from './ChartData.js';
 import { nameOf } from './SensorRow.js';
-import { exactTimeText, readingText, text } from './Texts.js';
+import { momentText, readingText, setText, text } from './Texts.js';
 
 const namespace = 'http://www.w3.org/2000/svg';
 
@@ -24,18 +24,22 @@ function sampleLine(index) {
 }
 
 export class ChartLegend {
-    #sensors = [];
+    #devices = [];
     #values = [];
-    #rows = [];
+    #history = null;
+    #row = null; // of the history, where the pointer is
 
     /** Calls `onRemove` with the deviceId of a sensor that the user removes. */
-    constructor(onRemove) {
+    constructor(machine, onRemove) {
+        this.machine = machine;
         this.list = document.getElementById('compared');
         this.onRemove = onRemove;
+        machine.addEventListener('change', () => this.#update());
     }
 
     show(sensors) {
-        this.#sensors = sensors;
+        this.#devices = sensors.map(({ deviceId }) => deviceId);
+        this.#history = null;
         this.#values = sensors.map(() => document.createElement('span'));
         this.list.replaceChildren(...sensors.map((sensor, index) => {
             const item = document.createElement('li');
@@ -54,17 +58,24 @@ export class ChartLegend {
     }
 
     setHistory(history) {
-        this.#rows = rowsOf(history);
+        this.#history = history;
     }
 
     /** Shows the readings of a row of the history; the present ones for null. */
     showRow(row) {
-        const [time, ...values] = this.#rows[row] ?? [];
-        this.#sensors.forEach((sensor, index) => {
+        this.#row = row;
+        this.#update();
+    }
+
+    #update() {
+        const [time, ...values] =
+            this.#history && this.#row !== null ? rowsOf(this.#history)[this.#row] ?? [] : [];
+        this.#devices.forEach((device, index) => {
+            const { value, unit } = this.machine.sensors.get(device) ?? { value: null };
             const then = Array.isArray(values[index]) ? values[index][1] : values[index];
-            this.#values[index].textContent = time
-                ? `${readingText(then, sensor.unit)} (${exactTimeText(time / 1000)})`
-                : readingText(sensor.value, sensor.unit);
+            setText(this.#values[index], time
+                ? `${readingText(then, unit)} (${momentText(time / 1000, this.#history.span)})`
+                : readingText(value, unit));
         });
     }
 

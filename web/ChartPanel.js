@@ -8,7 +8,7 @@ import { ChartLegend } from './ChartLegend.js';
 import { fillStateChanges, summaryText } from './ChartWords.js';
 import { compareSensors } from './Machine.js';
 import { nameOf } from './SensorRow.js';
-import { isolated, text } from './Texts.js';
+import { isolated, setText, text } from './Texts.js';
 
 const zooms = { in: [0.25, 0.75], out: [-0.5, 1.5], earlier: [-0.5, 0.5], later: [0.5, 1.5] };
 const refreshAfter = { hour: 10_000, day: 60_000 };
@@ -25,7 +25,7 @@ export class ChartPanel {
         this.panel = document.getElementById('chart');
         this.title = document.getElementById('chart-title');
         this.comparison = document.getElementById('compare');
-        this.legend = new ChartLegend((device) => {
+        this.legend = new ChartLegend(machine, (device) => {
             this.#set(this.devices.filter((other) => other !== device));
             this.focus(); // the button that was pressed is gone
         });
@@ -35,18 +35,29 @@ export class ChartPanel {
             if (key === 'Escape')
                 this.#set([]);
         });
-        this.comparison.addEventListener('change', () =>
-            this.#set([...this.devices, this.comparison.value]));
-        matchMedia('(prefers-color-scheme: dark)').addEventListener('change',
-            () => this.chart.redraw());
+        matchMedia('(prefers-color-scheme: dark)').addEventListener('change', () => {
+            this.legend.show(this.#sensors());
+            this.chart.redraw();
+        });
+        this.narrow = matchMedia('(max-width: 40rem)');
+        this.narrow.addEventListener('change', () => this.#coverPage());
     }
 
-    /** Shows the sensors in the address of which the machine has, or had, one. */
+    /**
+     * Shows the sensors in the address that the machine has, or had, and of them those of one unit.
+     * Says which the machine has not.
+     */
     show() {
         const { address, machine } = this;
         const known = address.devices.filter((device) => machine.sensors.has(device));
-        this.devices = known.slice(0, mostSensors);
+        const { unit } = machine.sensors.get(known[0]) ?? {};
+        this.devices = known.filter((device) => machine.sensors.get(device).unit === unit)
+            .slice(0, mostSensors);
+        const missing = address.devices.filter((device) => !machine.sensors.has(device));
+        setText(document.getElementById('missing'), missing.length === 0 ? ''
+            : text('missing', { names: missing.map(isolated).join(', ') }));
         this.panel.hidden = this.devices.length === 0;
+        this.#coverPage();
         clearTimeout(this.#timer);
         if (this.panel.hidden) {
             this.chart.remove();
@@ -63,6 +74,12 @@ export class ChartPanel {
 
     focus() {
         this.title.focus();
+    }
+
+    /** Takes the page out of the order of the keyboard where the panel covers it. */
+    #coverPage() {
+        for (const element of document.querySelectorAll('.skip, .machine, main'))
+            element.inert = this.narrow.matches && !this.panel.hidden;
     }
 
     #sensors() {
@@ -82,6 +99,8 @@ export class ChartPanel {
             this.chart.showAll();
         else if (zoom)
             this.chart.zoom(...zooms[zoom]);
+        else if (target.id === 'compare-add' && this.comparison.value)
+            this.#set([...this.devices, this.comparison.value]);
         else if (target.id === 'chart-close')
             this.#set([]);
     }
@@ -98,16 +117,18 @@ export class ChartPanel {
     /** Draws the history that the server has now, and again when there is more of it. */
     async #draw() {
         const { devices, address: { span } } = this;
+        let words = null;
         const [history] = await Promise.all([loadHistory(devices, span), loadDygraphs()])
-            .catch(() => [null]); // there is no connection
+            .catch(() => [null, words = text('historyFailed')]); // what is drawn stays
         if (devices !== this.devices || span !== this.address.span)
             return;
         const sensors = this.#sensors();
-        this.panel.classList.toggle('empty', !history);
-        document.getElementById('plot-summary').textContent =
-            history ? summaryText(history, sensors) : text('noHistory');
+        if (!words)
+            this.panel.classList.toggle('empty', !history);
+        words ??= history ? summaryText(history, sensors) : text('noHistory');
+        setText(document.getElementById('plot-summary'), words);
         if (history) {
-            this.chart.show(history, sensors[0]);
+            this.chart.show(history, sensors);
             this.legend.setHistory(history);
             fillStateChanges(document.getElementById('state-changes'), history, sensors);
         }

@@ -3,17 +3,21 @@
 // What lies below the lines of the chart: the limits of the first sensor, and the states of all.
 
 import { limitText, quantityText, stateText } from './Texts.js';
+import { nameOf } from './SensorRow.js';
 import { urgencyOf } from './States.js';
 
-const stripHeight = 5;
+const stripHeight = 17;
 const margin = 4;
 
 /** Returns a color or font of the style sheet by the name of its variable. */
 export const styleValue = (name) =>
     getComputedStyle(document.documentElement).getPropertyValue(name).trim();
 
-/** Fills the plot behind one sensor's states; each of several sensors has a strip at the bottom. */
-function drawStates(canvas, area, chart, runsOfSensors) {
+/**
+ * Fills the plot behind one sensor's states. Each of several sensors has a strip at the bottom,
+ * with its name.
+ */
+function drawStates(canvas, area, chart, sensors, runsOfSensors) {
     const isStrip = runsOfSensors.length > 1;
     runsOfSensors.forEach((runs, index) => {
         for (const { state, begin, end } of runs) {
@@ -24,20 +28,22 @@ function drawStates(canvas, area, chart, runsOfSensors) {
             const right = Math.min(chart.toDomXCoord(end), area.x + area.w);
             if (right <= left)
                 continue;
-            canvas.fillStyle = styleValue(isStrip ? `--${urgency}` : `--${urgency}-band`);
-            const top = area.y + area.h - stripHeight * (runsOfSensors.length - index);
-            canvas.fillRect(left, isStrip ? top : area.y, right - left,
-                isStrip ? stripHeight - 1 : area.h);
-            const words = stateText(state);
-            if (!isStrip && canvas.measureText(words).width + 2 * margin < right - left) {
+            canvas.fillStyle = styleValue(`--${urgency}-band`);
+            const bottom = area.y + area.h - stripHeight * (runsOfSensors.length - index - 1);
+            const height = isStrip ? stripHeight - 1 : area.h;
+            canvas.fillRect(left, bottom - height, right - left, height);
+            const longWords = `${nameOf(sensors[index])}: ${stateText(state)}`;
+            const words = (isStrip ? [longWords, stateText(state)] : [stateText(state)]).find(
+                (each) => canvas.measureText(each).width + 2 * margin < right - left);
+            if (words) {
                 canvas.fillStyle = styleValue(`--${urgency}`);
-                canvas.fillText(words, left + margin, area.y + area.h - margin);
+                canvas.fillText(words, left + margin, bottom - margin);
             }
         }
     });
 }
 
-function drawLimits(canvas, area, chart, { limits, unit }) {
+function drawLimits(canvas, area, chart, { limits, unit }, prefix) {
     for (const [name, value] of Object.entries(limits)) {
         const y = chart.toDomYCoord(value);
         if (y < area.y || y > area.y + area.h)
@@ -50,18 +56,19 @@ function drawLimits(canvas, area, chart, { limits, unit }) {
         canvas.lineTo(area.x + area.w, y);
         canvas.stroke();
         canvas.fillStyle = color;
-        const words = `${limitText(name)} ${quantityText(value, unit)}`;
+        const words = `${prefix}${limitText(name)} ${quantityText(value, unit)}`;
         canvas.fillText(words, area.x + area.w - canvas.measureText(words).width - margin,
             name.startsWith('low') ? y + 13 : y - margin);
     }
 }
 
 /** Draws limits and states; `area` is the plot's rectangle on the canvas. */
-export function drawUnderlay(canvas, area, chart, { sensor, runsOfSensors }) {
+export function drawUnderlay(canvas, area, chart, { sensors, runsOfSensors }) {
     canvas.save();
     canvas.font = `12px ${styleValue('--font')}`;
     canvas.lineWidth = 1;
-    drawStates(canvas, area, chart, runsOfSensors);
-    drawLimits(canvas, area, chart, sensor);
+    drawStates(canvas, area, chart, sensors, runsOfSensors);
+    drawLimits(canvas, area, chart, sensors[0],
+        sensors.length > 1 ? `${nameOf(sensors[0])}: ` : '');
     canvas.restore();
 }

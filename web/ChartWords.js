@@ -4,7 +4,7 @@
 
 import { extremesOf, stateRunsOf } from './ChartData.js';
 import { nameOf } from './SensorRow.js';
-import { exactTimeText, isolated, readingText, stateText, text } from './Texts.js';
+import { isolated, momentText, readingText, setText, stateText, text } from './Texts.js';
 
 /** Returns a sentence for each sensor: its least, mean and greatest reading. */
 export function summaryText(history, sensors) {
@@ -19,16 +19,20 @@ export function summaryText(history, sensors) {
     }).join(' ');
 }
 
-/** Fills the list with the states of each sensor, the latest first. */
+/** Fills the list with the states of each sensor, the latest first. Keeps items that stay. */
 export function fillStateChanges(list, history, sensors) {
-    list.replaceChildren(...sensors.flatMap((sensor, index) => {
+    const lines = sensors.flatMap((sensor, index) => {
         const runs = stateRunsOf(history.sensors[index], history).reverse();
         return runs.map(({ state, begin, end }) => {
-            const item = document.createElement('li');
             const words = state === null ? text('nothingRecorded') : stateText(state);
-            item.textContent = `${isolated(nameOf(sensor))}: ${words}, ` +
-                `${exactTimeText(begin / 1000)} – ${exactTimeText(end / 1000)}`;
-            return item;
+            const [from, to] = [begin, end].map((time) => momentText(time / 1000, history.span));
+            return `${isolated(nameOf(sensor))}: ${words}, ${from} – ${to}`;
         });
-    }));
+    });
+    while (list.children.length > lines.length)
+        list.lastElementChild.remove();
+    lines.forEach((line, index) => {
+        const item = list.children[index] ?? list.appendChild(document.createElement('li'));
+        setText(item, line);
+    });
 }

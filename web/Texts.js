@@ -27,8 +27,13 @@ export function setText(element, words) {
         element.textContent = words;
 }
 
-/** Isolates data within a text, so that its direction does not change that of the neighbours. */
-export const isolated = (data) => `\u2068${data}\u2069`;
+const directionMarks = /[\u061c\u200e\u200f\u202a-\u202e\u2066-\u2069]/g;
+
+/**
+ * Returns data for a place within a text whose direction it does not change: isolated and without
+ * the marks that would end the isolation.
+ */
+export const isolated = (data) => `\u2068${data.replace(directionMarks, '')}\u2069`;
 
 const decimals = { '°C': 1, 'V': 2, 'RPM': 0 };
 const formats = new Map();
@@ -56,6 +61,7 @@ export function quantityText(value, unit) {
 
 const timeOfDay = new Intl.DateTimeFormat(locale, { timeStyle: 'short' });
 const dayAndTime = new Intl.DateTimeFormat(locale, { dateStyle: 'short', timeStyle: 'short' });
+const day = new Intl.DateTimeFormat(locale, { dateStyle: 'short' });
 const exactTime = new Intl.DateTimeFormat(locale, { timeStyle: 'medium' });
 
 /** Returns a time of Unix in the browser's zone: with the date unless it is of today. */
@@ -65,9 +71,16 @@ export function timeText(seconds) {
     return (isToday ? timeOfDay : dayAndTime).format(time);
 }
 
-/** Returns a time of day with seconds. */
-export const exactTimeText = (seconds) => exactTime.format(seconds * 1000);
+/** Returns a time in a span: of the hour with seconds, of the day with the date. */
+export const momentText = (seconds, span) =>
+    (span === 'hour' ? exactTime : dayAndTime).format(seconds * 1000);
 
-/** Returns the label of a time axis that shows that many seconds. */
-export const axisTimeText = (seconds, span) =>
-    (span < 600 ? exactTime : timeOfDay).format(seconds * 1000);
+/** Returns the present time with the date. */
+export const nowText = () => dayAndTime.format(new Date());
+
+/** Returns the label of a time axis that shows that many seconds: at midnight, the date. */
+export function axisTimeText(seconds, length) {
+    const time = new Date(seconds * 1000);
+    const isMidnight = time.getHours() + time.getMinutes() + time.getSeconds() === 0;
+    return (isMidnight ? day : length < 600 ? exactTime : timeOfDay).format(time);
+}

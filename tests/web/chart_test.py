@@ -38,8 +38,8 @@ class ChartTest(PageTest):
         super().setUp()
         self.server = demonstration()
 
-    def open_chart(self, query):
-        self.open(self.server, query)
+    def open_chart(self, query, server=None):
+        self.open(server or self.server, query)
         self.wait_for("document.querySelector('#plot canvas') && "
                       "document.querySelector('#plot-summary').textContent")
 
@@ -63,6 +63,8 @@ class ChartTest(PageTest):
         select = Select(self.driver.find_element("id", "compare"))
         self.assertEqual([], [option.text for option in select.options if "Fan" in option.text])
         select.select_by_value(CPU1)
+        self.assertEqual(["CPU 2 Package Temp"], self.run_script(LEGEND))
+        self.driver.find_element("id", "compare-add").click()
         self.wait_for(f"{LEGEND}.length === 2")
         self.wait_for("document.querySelector('#plot-summary').textContent.includes('CPU 1')")
         self.driver.back()
@@ -102,6 +104,18 @@ class ChartTest(PageTest):
             for name in ("--critical", "--warning-band"):
                 with self.subTest(name, scheme=scheme):
                     self.wait_for(DRAWS, 5, name)
+
+    def test_follows_the_readings(self):
+        machine = Machine.demonstration()
+        self.open_chart("?device=" + CPU1, self.serve(machine))
+        machine.set_reading("/system/cpu1/package", 240)
+        self.wait_for("document.querySelector('#compared .value').textContent.startsWith('240')", 5)
+
+    def test_names_the_sensors_that_are_missing(self):
+        self.open_chart("?device=none:/a&device=" + CPU2 + "&device=" + CPU2)
+        self.assertEqual("The machine has no sensor \u2068none:/a\u2069 now.", self.run_script(
+            "document.querySelector('#missing').textContent"))
+        self.assertEqual(["CPU 2 Package Temp"], self.run_script(LEGEND))
 
     def test_lists_the_states_in_words(self):
         self.open_chart("?device=" + CPU2)

@@ -7,7 +7,8 @@ from machine import Machine
 from served import Server
 
 MARKUP = "<img src=x onerror=alert(1)><script>document.title='broken'</script>"
-TURNED = "\u202eTurned\u2066 \u200fleft"
+TURNED = "\u202eTurned\u2066 \u200fleft\u2069\u202e"
+MARKS = "\u200f\u202e\u2066\u2069"
 QUOTED = "\"'&amp;{{machine}}${1}"
 
 
@@ -38,10 +39,10 @@ class SafetyTest(PageTest):
                 self.driver.execute_script("arguments[0].click()", row)
                 self.wait_for("document.querySelector('#plot canvas')")
                 self.wait_for("document.querySelector('#plot-summary').textContent"
-                              ".includes(arguments[0])", 5, name.rpartition(":")[0])
-        self.driver.execute_script("const select = document.querySelector('#compare');"
-                                   "select.selectedIndex = 1;"
-                                   "select.dispatchEvent(new Event('change', {bubbles: true}))")
+                              ".includes(arguments[0])", 5,
+                              name.rpartition(":")[0].translate(dict.fromkeys(map(ord, MARKS))))
+        self.driver.execute_script("document.querySelector('#compare').selectedIndex = 1;"
+                                   "document.querySelector('#compare-add').click()")
         self.wait_for("document.querySelectorAll('#compared li').length === 2")
         self.assertEqual(
             0, self.run_script("document.querySelectorAll('img, main script').length"))
