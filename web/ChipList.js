@@ -10,6 +10,7 @@ const template = document.getElementById('chip-template').content.firstElementCh
 export class ChipList {
     #chips = new Map(); // by name: the element, its list and the number of visible rows
     #rows = new Map(); // by deviceId
+    #added = 0; // number of chips until now
     #selects = () => true;
 
     constructor(container, machine, sparklines) {
@@ -18,8 +19,13 @@ export class ChipList {
         this.sparklines = sparklines;
     }
 
-    /** Updates the rows of these sensors; adds the new ones at their place. */
-    update(sensors) {
+    /**
+     * Updates the rows of these sensors, adds the new ones at their place, and removes those of
+     * forgotten ones.
+     */
+    update(sensors, forgotten) {
+        for (const deviceId of forgotten)
+            this.#remove(deviceId);
         const added = sensors.filter((sensor) => !this.#rows.has(sensor.deviceId));
         const changedChips = new Set(added.map((sensor) => sensor.chip));
         for (const sensor of sensors)
@@ -76,6 +82,21 @@ export class ChipList {
         this.sparklines.observe(row.element);
     }
 
+    #remove(deviceId) {
+        const { element } = this.#rows.get(deviceId);
+        this.#rows.delete(deviceId);
+        this.sparklines.forget(element);
+        const chip = element.closest('.chip');
+        const name = chip.querySelector('.chip-title').textContent;
+        element.remove();
+        if (chip.querySelector('.sensor')) {
+            this.#count([name]);
+        } else {
+            chip.remove();
+            this.#chips.delete(name);
+        }
+    }
+
     #chip(sensor) {
         const known = this.#chips.get(sensor.chip);
         if (known)
@@ -83,7 +104,7 @@ export class ChipList {
         const element = template.cloneNode(true);
         const title = element.querySelector('.chip-title');
         title.textContent = sensor.chip;
-        title.id = `chip-${this.#chips.size}`;
+        title.id = `chip-${++this.#added}`;
         element.setAttribute('aria-labelledby', title.id);
         element.querySelector('.device').textContent = sensor.device ?? '';
         const chip = { element, list: element.querySelector('ul'), first: sensor, visible: 0 };

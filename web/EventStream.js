@@ -3,34 +3,41 @@
 // The server's events, with reconnection.
 
 const retryAfter = 2_000;
+const retrySpread = 1_000; // so that not all pages come back at the same time
 const silenceLimit = 40_000; // the server sends something every 15 seconds
 
 /**
  * Receives `/api/events` while the page is visible: a browser has few connections to a server, and
- * hidden pages would use them up. Calls `handler` with the name and the data of each event but the
- * signs of life, and `onState` with the time since which there is no connection, in milliseconds;
- * with null when there is one.
+ * hidden pages would use them up. Calls `handler` with the name and the data of each event, and
+ * `onState` with one of `live`, `connecting` and `lost`, and the time of the last contact in
+ * milliseconds; null for none.
  */
 export class EventStream {
     #source = null;
     #timer = 0;
-    #lostSince = null;
+    #isLive = false;
+    #lastContact = null;
 
     constructor(handler, onState) {
         this.handler = handler;
         this.onState = onState;
-        document.addEventListener('visibilitychange', () => this.#begin());
-        this.#begin();
+        document.addEventListener('visibilitychange', () => this.#begin('connecting'));
+        this.#begin('connecting');
     }
 
-    #begin() {
+    #begin(state) {
         this.#end();
         if (document.visibilityState === 'hidden')
             return;
+        this.onState(state, this.#lastContact);
         this.#source = new EventSource('/api/events');
         for (const name of ['sensors', 'changes', 'alive'])
             this.#source.addEventListener(name, (event) => this.#receive(name, event));
-        this.#source.addEventListener('error', () => this.#lose());
+        this.#source.addEventListener('error', () => {
+            if (this.#isLive)
+                this.#lastContact = Date.now();
+            this.#lose();
+        });
         this.#setTimer(() => this.#lose(), silenceLimit);
     }
 
@@ -38,21 +45,22 @@ export class EventStream {
         clearTimeout(this.#timer);
         this.#source?.close();
         this.#source = null;
+        this.#isLive = false;
     }
 
     #receive(name, event) {
         this.#setTimer(() => this.#lose(), silenceLimit);
-        this.#lostSince = null;
-        this.onState(null);
-        if (name !== 'alive')
-            this.handler(name, JSON.parse(event.data));
+        this.#isLive = true;
+        this.#lastContact = Date.now();
+        this.onState('live', this.#lastContact);
+        this.handler(name, JSON.parse(event.data));
     }
 
     #lose() {
         this.#end();
-        this.#lostSince ??= Date.now();
-        this.onState(this.#lostSince);
-        this.#setTimer(() => this.#begin(), retryAfter);
+        this.#lastContact ??= Date.now();
+        this.onState('lost', this.#lastContact);
+        this.#setTimer(() => this.#begin('lost'), retryAfter + retrySpread * Math.random());
     }
 
     #setTimer(callback, delay) {

@@ -3,10 +3,12 @@
 // The last hour of all sensors, a reading a minute.
 
 const points = 60;
+const secondsOfPoint = 60;
 
 export class HourHistory {
     #values = new Map(); // by deviceId, at most `points` of them
     #timer = 0;
+    #isMissing = false;
 
     constructor(machine) {
         this.machine = machine;
@@ -14,21 +16,24 @@ export class HourHistory {
 
     /**
      * Reads the history, which the readings of the machine continue until the next call. Sets also
-     * since when the sensors are in their states. Does nothing where there is no history.
+     * since when the sensors are in their states. Where the server keeps no history, the readings
+     * are collected from now on; where it does not answer, it is asked again after a minute.
      */
     async load() {
-        const response = await fetch(`/api/history?span=hour&points=${points}`);
-        if (!response.ok)
+        clearInterval(this.#timer);
+        this.#timer = setInterval(() => this.#continue(), 1000 * secondsOfPoint);
+        const response = await fetch(`/api/history?span=hour&points=${points}`).catch(() => null);
+        this.#isMissing = response?.status !== 404;
+        if (!response?.ok)
             return;
         const { interval, end, sensors } = await response.json();
+        this.#isMissing = false;
         this.#values = new Map(sensors.map(({ deviceId, values }) => [deviceId, values]));
         this.machine.setSince(sensors.map(({ deviceId, states }) => {
             const [before, [state, count]] = [[null, 0], [null, 0], ...states].slice(-2);
             const isSinceEarlier = before[0] === null; // nothing was recorded before
             return { deviceId, state, since: end - count * interval, isSinceEarlier };
         }));
-        clearInterval(this.#timer);
-        this.#timer = setInterval(() => this.#continue(), interval * 1000);
     }
 
     /** Returns the readings of the last hour and the present one, the oldest first. */
@@ -38,9 +43,11 @@ export class HourHistory {
     }
 
     #continue() {
-        for (const { deviceId, value } of this.machine.sensors.values()) {
-            const values = [...(this.#values.get(deviceId) ?? []), value];
-            this.#values.set(deviceId, values.slice(-points));
+        if (this.#isMissing) {
+            this.load();
+            return;
         }
+        this.#values = new Map([...this.machine.sensors.values()].map(({ deviceId, value }) =>
+            [deviceId, [...(this.#values.get(deviceId) ?? []), value].slice(-points)]));
     }
 }

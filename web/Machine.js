@@ -2,9 +2,11 @@
 
 // The sensors of the machine as the page knows them.
 
+import { namesOf } from './Selectors.js';
 import { isProblem, urgencyOf } from './States.js';
 
 const order = new Intl.Collator('en', { numeric: true, sensitivity: 'base' });
+const secondsUntilForgotten = 3600;
 
 /** Compares sensors by chip, label and identifier, so that "temp2" comes before "temp10". */
 export function compareSensors(first, second) {
@@ -15,22 +17,31 @@ export function compareSensors(first, second) {
 
 /**
  * A sensor is an object of `/api/sensors` with
+ * - `names`, by which it is searched for;
  * - `urgency`, one of States.js;
  * - `isGone`: the machine does not have the sensor any more;
  * - `since`: the time of Unix at which its state began, null while that is unknown;
  * - `isSinceEarlier`: the state began at an unknown time before `since`.
+ * A sensor that is gone for an hour is forgotten.
  *
- * Dispatches `change`, whose `detail` has the sensors that were added or have changed, and what
- * they were before.
+ * Dispatches `change`, whose `detail` has the sensors that were added or have changed, what they
+ * were before, and the identifiers of those that are forgotten.
  */
 export class Machine extends EventTarget {
     sensors = new Map(); // by deviceId
+    #clockLead = 0; // of the server's clock, in seconds
+
+    /** Takes the time of the server's clock. */
+    setTime(time) {
+        this.#clockLead = time - Date.now() / 1000;
+        this.#store([]);
+    }
 
     /** Takes the list of all sensors. Those that it lacks are gone. */
     replace(list) {
         const listed = new Set(list.map((sensor) => sensor.deviceId));
         const gone = [...this.sensors.keys()].filter((deviceId) => !listed.has(deviceId));
-        this.#change(list, gone, { since: Math.floor(Date.now() / 1000), isSinceEarlier: true },
+        this.#change(list, gone, { since: this.#now(), isSinceEarlier: true },
             { since: null, isSinceEarlier: false });
     }
 
@@ -58,6 +69,10 @@ export class Machine extends EventTarget {
         return [...this.sensors.values()].filter((sensor) => isProblem(sensor.urgency));
     }
 
+    #now() {
+        return Math.floor(Date.now() / 1000 + this.#clockLead);
+    }
+
     /** Takes sensors; states began at `beginning`, and those of new sensors at `newBeginning`. */
     #change(sensors, gone, beginning, newBeginning) {
         const changed = sensors.map((sensor) => {
@@ -65,7 +80,8 @@ export class Machine extends EventTarget {
             const isSame = known && !known.isGone && known.state === sensor.state;
             const { since, isSinceEarlier } = isSame ? known : known ? beginning : newBeginning;
             const urgency = urgencyOf(sensor.state);
-            return { ...sensor, urgency, isGone: false, since, isSinceEarlier };
+            const names = known?.names ?? namesOf(sensor);
+            return { ...sensor, names, urgency, isGone: false, since, isSinceEarlier };
         });
         for (const deviceId of gone) {
             const known = this.sensors.get(deviceId);
@@ -80,6 +96,13 @@ export class Machine extends EventTarget {
         const before = changed.map((sensor) => this.sensors.get(sensor.deviceId));
         for (const sensor of changed)
             this.sensors.set(sensor.deviceId, sensor);
-        this.dispatchEvent(new CustomEvent('change', { detail: { changed, before } }));
+        const earliest = this.#now() - secondsUntilForgotten;
+        const forgotten = [...this.sensors.values()].filter(({ isGone, since }) =>
+            isGone && since < earliest).map(({ deviceId }) => deviceId);
+        for (const deviceId of forgotten)
+            this.sensors.delete(deviceId);
+        if (changed.length > 0 || forgotten.length > 0)
+            this.dispatchEvent(new CustomEvent('change',
+                { detail: { changed, before, forgotten } }));
     }
 }

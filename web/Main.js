@@ -10,7 +10,7 @@ import { HourHistory } from './HourHistory.js';
 import { Machine } from './Machine.js';
 import { Overview } from './Overview.js';
 import { Sparklines } from './Sparkline.js';
-import { loadTexts, setText, text, timeText } from './Texts.js';
+import { loadTexts, nowText, setText, text, timeText } from './Texts.js';
 
 const texts = loadTexts();
 const address = new Address();
@@ -34,12 +34,18 @@ function showChart() {
         overview.returnFocus(last);
 }
 
-function showConnection(lostSince) {
-    const words = lostSince === null ? text('live')
-        : text('connectionLost', { time: timeText(lostSince / 1000) });
-    setText(document.getElementById('connection'), words);
-    document.body.classList.toggle('offline', lostSince !== null);
+function showConnection(state, lastContact) {
+    const time = lastContact && timeText(lastContact / 1000);
+    const words = { live: () => text('live'), lost: () => text('connectionLost', { time }),
+        connecting: () => time ? text('connecting', { time }) : '' };
+    setText(document.getElementById('connection'), words[state]());
+    if (document.body.dataset.connection !== state)
+        document.body.dataset.connection = state;
 }
+
+addEventListener('beforeprint', () => {
+    setText(document.getElementById('printed'), nowText());
+});
 
 let isShown = false;
 
@@ -52,16 +58,23 @@ function showOverview() {
 }
 
 function receive(name, data) {
-    if (name === 'changes') {
+    if (name !== 'sensors')
+        machine.setTime(data.time);
+    if (name === 'changes')
         machine.apply(data);
+    if (name !== 'sensors')
         return;
-    }
     machine.replace(data);
     if (!isShown)
         showOverview();
-    hourHistory.load().then(() => sparklines.drawVisible(), () => {}); // the next list tries again
+    hourHistory.load().then(() => sparklines.drawVisible(), () => {}); // it tries again
 }
 
+machine.addEventListener('change', ({ detail: { before, forgotten } }) => {
+    const areOthers = before.includes(undefined) || forgotten.length > 0;
+    if (isShown && address.devices.length > 0 && areOthers)
+        showChart();
+});
 address.addEventListener('change', () => {
     overview.search();
     showChart();

@@ -21,7 +21,9 @@ export class Overview {
         this.found = document.getElementById('found');
         this.chips = new ChipList(document.querySelector('.chips'), machine, sparklines);
         this.troubles = new TroubleList(document.getElementById('troubles'), machine, sparklines);
-        machine.addEventListener('change', ({ detail }) => this.#update(detail.changed));
+        machine.addEventListener('change', ({ detail }) =>
+            this.#update(detail.changed, detail.forgotten));
+        document.addEventListener('visibilitychange', () => this.#setTitle());
         this.form.addEventListener('submit', (event) => event.preventDefault());
         this.form.addEventListener('input', () => {
             const { search, problems } = this.form.elements;
@@ -52,6 +54,7 @@ export class Overview {
             elements.search.value = search;
         elements.problems.checked = hasProblemsOnly;
         const finds = searchFor(search);
+        this.troubles.select(finds);
         this.chips.select((sensor) =>
             (!hasProblemsOnly || isProblem(sensor.urgency)) && finds(sensor));
         this.#showFound();
@@ -68,8 +71,7 @@ export class Overview {
 
     /** Moves the focus to what opened the chart; where that is gone, to the sensor's row. */
     returnFocus(device) {
-        const opener = this.#opener?.isConnected ? this.#opener : this.chips.row(device).button;
-        opener.focus();
+        focusFirst(this.#opener, this.chips.row(device)?.button);
     }
 
     #showFound() {
@@ -78,12 +80,13 @@ export class Overview {
         setText(this.found, isLimited ? text('found', { number: this.chips.visible }) : '');
     }
 
-    #update(changed) {
-        const focused = document.activeElement.closest('.sensor')?.dataset.device;
-        this.troubles.update(changed);
-        this.chips.update(changed);
-        if (focused && !document.activeElement.closest('.sensor'))
-            this.chips.row(focused).button.focus(); // its row among the troubles was removed
+    #update(changed, forgotten) {
+        const focused = document.activeElement;
+        const device = focused.closest('.sensor')?.dataset.device;
+        this.troubles.update(changed, forgotten);
+        this.chips.update(changed, forgotten);
+        if (device && (document.activeElement !== focused || !focused.checkVisibility()))
+            focusFirst(focused, this.chips.row(device)?.button); // its row was moved or removed
         this.markShown(this.#shown);
         this.#showFound();
         this.#count();
@@ -100,8 +103,19 @@ export class Overview {
             item.dataset.number = number;
             item.querySelector('b').textContent = number;
         }
-        const problems = this.machine.troubles().length;
-        const name = document.querySelector('h1').textContent;
-        document.title = problems > 0 ? `(${problems}) ${name}` : name;
+        this.#setTitle();
     }
+
+    /** Shows the number of troubles in the title while it is kept up to date. */
+    #setTitle() {
+        const number = document.visibilityState === 'hidden' ? 0 : this.machine.troubles().length;
+        const name = document.querySelector('h1').textContent;
+        document.title = number > 0 ? `(${number}) ${name}` : name;
+    }
+}
+
+/** Moves the focus to the first of the elements that can be seen; for none, to the content. */
+function focusFirst(...elements) {
+    const found = elements.find((element) => element?.isConnected && element.checkVisibility());
+    (found ?? document.getElementById('content')).focus();
 }

@@ -33,8 +33,9 @@ export function sparklinePath(values) {
 
 const redrawInterval = 10_000;
 
-/** Draws the sparklines of rows that can be seen: at once, then every ten seconds. */
+/** Draws the sparklines of rows that can be seen, at once and every ten seconds; on paper, all. */
 export class Sparklines {
+    #all = new Set();
     #visible = new Set();
 
     /** `valuesOf` returns the readings for a deviceId. */
@@ -42,29 +43,40 @@ export class Sparklines {
         this.valuesOf = valuesOf;
         this.observer = new IntersectionObserver((entries) => {
             for (const { target, isIntersecting } of entries) {
-                if (isIntersecting)
+                if (isIntersecting) {
                     this.#visible.add(target);
-                else
+                    this.#draw(target);
+                } else {
                     this.#visible.delete(target);
+                }
             }
-            this.drawVisible();
         });
         setInterval(() => this.drawVisible(), redrawInterval);
+        addEventListener('beforeprint', () => this.#drawOn(this.#all));
     }
 
     observe(row) {
+        this.#all.add(row);
         this.observer.observe(row);
     }
 
     forget(row) {
         this.observer.unobserve(row);
+        this.#all.delete(row);
         this.#visible.delete(row);
     }
 
     drawVisible() {
-        for (const row of this.#visible) {
-            const path = sparklinePath(this.valuesOf(row.dataset.device));
-            row.querySelector('.sparkline path').setAttribute('d', path);
-        }
+        this.#drawOn(this.#visible);
+    }
+
+    #drawOn(rows) {
+        for (const row of rows)
+            this.#draw(row);
+    }
+
+    #draw(row) {
+        const path = sparklinePath(this.valuesOf(row.dataset.device));
+        row.querySelector('.sparkline path').setAttribute('d', path);
     }
 }

@@ -12,6 +12,7 @@ const compareTroubles = (first, second) =>
 
 export class TroubleList {
     #rows = new Map(); // by deviceId
+    #selects = () => true;
 
     constructor(section, machine, sparklines) {
         this.section = section;
@@ -21,9 +22,19 @@ export class TroubleList {
         section.hidden = true;
     }
 
+    /** Shows only the sensors for which the function returns true. */
+    select(selects) {
+        this.#selects = selects;
+        for (const deviceId of this.#rows.keys())
+            this.#show(deviceId);
+        this.#showSection();
+    }
+
     /** Updates the rows of these sensors; adds, removes and moves rows as their urgency changes. */
-    update(sensors) {
-        let isReordered = false;
+    update(sensors, forgotten) {
+        let isReordered = forgotten.length > 0;
+        for (const deviceId of forgotten)
+            this.#remove(deviceId);
         for (const sensor of sensors) {
             const row = this.#rows.get(sensor.deviceId);
             isReordered ||= (row?.urgency ?? 'normal') !== sensor.urgency;
@@ -47,6 +58,16 @@ export class TroubleList {
         this.#rows.set(sensor.deviceId, row);
         this.list.append(row.element);
         this.sparklines.observe(row.element);
+        this.#show(sensor.deviceId);
+    }
+
+    #show(deviceId) {
+        const { element } = this.#rows.get(deviceId);
+        element.hidden = !this.#selects(this.machine.sensors.get(deviceId));
+    }
+
+    #showSection() {
+        this.section.hidden = !this.list.querySelector(':scope > :not([hidden])');
     }
 
     #remove(deviceId) {
@@ -58,7 +79,7 @@ export class TroubleList {
         this.#rows.delete(deviceId);
     }
 
-    /** Moves only the rows that are out of order, so that the others keep the keyboard's focus. */
+    /** Moves rows to the order of their urgency. */
     #order() {
         let place = this.list.firstElementChild;
         for (const { deviceId } of this.machine.troubles().sort(compareTroubles)) {
@@ -68,6 +89,6 @@ export class TroubleList {
             else
                 this.list.insertBefore(element, place);
         }
-        this.section.hidden = this.#rows.size === 0;
+        this.#showSection();
     }
 }

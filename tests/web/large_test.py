@@ -31,7 +31,8 @@ class LargeMachineTest(PageTest):
 
         self.driver.execute_script(OBSERVE)
         changed = machine.change_temperatures(CHANGED, 48)
-        self.wait_for(f"{ROWS}.filter(row => row.textContent.includes('48.0')).length === {CHANGED}")
+        self.wait_for(
+            f"{ROWS}.filter(row => row.textContent.includes('48.0')).length === {CHANGED}")
         rows = self.run_script("[...new Set(window.changed.map(each => each.closest('.sensor')))]"
                                ".map(row => row?.dataset.device)")
         self.assertEqual(sorted(changed), sorted(rows))

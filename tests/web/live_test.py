@@ -42,11 +42,12 @@ class LiveTest(PageTest):
         self.assertRegex(self.trouble_text("Battery"), r"Warning low since before \d")
         self.driver.execute_script("document.querySelector('#troubles button').focus()")
 
-        # At the same time: two sensors cross limits, one recovers, a chip vanishes, one is new.
+        # Together: two sensors cross limits, one recovers, one is lost, a chip vanishes, one is new.
         with self.machine.changes():
             self.machine.set_reading(FAN, 450)
             self.machine.set_reading("/system/cpu2/package", 97)
             self.machine.set_reading("/system/cpu2/dimmd1", 50)
+            self.machine.lose("/system/nic1/asic")
             removed = self.machine.remove_chip("/system/psu1")
             self.machine.add([{"type": "temperature", "path": "/system/cpu10/t", "baseUnits": 2,
                                "description": "CPU 10", "status": 1, "reading": 40}])
@@ -55,13 +56,14 @@ class LiveTest(PageTest):
         self.assertIn("Critical low", self.row_text("System Fan 1"))
         self.assertEqual(
             ["System Fan 1", "CPU 2 Package Temp", "PSU 2 Fan", "PSU 2 Input", "System Fan 4",
-             "Battery", "NVMe 2 Temp", "PSU 1 Fan", "PSU 1 Input", "PSU 1 Temp"],
+             "Battery", "NIC 1 Temp", "NVMe 2 Temp", "PSU 1 Fan", "PSU 1 Input", "PSU 1 Temp"],
             self.run_script(TROUBLES))
-        self.assertRegex(self.driver.title, r"^\(10\) ")
+        self.assertRegex(self.driver.title, r"^\(11\) ")
         self.assertEqual("CPU 2 DIMM D1 Temp", self.focused())
-        self.assertTrue(self.run_script(self.lost(4)))
+        self.assertTrue(self.run_script(self.lost(5)))
         self.assertRegex(self.row_text("PSU 1 Fan"), r"(?s)–.*Gone")
         self.assertRegex(self.trouble_text("PSU 1 Fan"), r"Gone since \d")
+        self.assertRegex(self.trouble_text("NIC 1 Temp"), r"Lost since \d")
         titles = self.run_script(TITLES)
         place = titles.index("system/cpu10")
         self.assertEqual(["system/cpu2", "system/nic1"], [titles[place - 1], titles[place + 1]])
@@ -72,7 +74,7 @@ class LiveTest(PageTest):
             self.machine.set_reading(FAN, 5300)
             self.machine.add(removed)
         self.wait_for(f"!{TROUBLES}.includes('System Fan 1')", 3)
-        self.assertTrue(self.run_script(self.lost(1)))
+        self.assertTrue(self.run_script(self.lost(2)))
         self.assertIn("7936\u00a0RPM", self.row_text("PSU 1 Fan"))
 
     def test_shows_a_sensor_that_becomes_a_problem_among_those_found(self):

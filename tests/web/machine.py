@@ -76,8 +76,14 @@ class Machine:
         self._nodes[path]["status"] = status_of(self._nodes[path])
         self.on_change()
 
+    def lose(self, path):
+        """Ends the communication with a sensor."""
+        del self._nodes[path]["reading"]
+        self._nodes[path]["status"] = LOST
+        self.on_change()
+
     def change_temperatures(self, count, reading):
-        """Changes the readings of the first temperatures; returns the identifiers of the sensors."""
+        """Changes the readings of the first temperatures. Returns their identifiers."""
         nodes = [node for node in self._nodes.values() if node["type"] == "temperature"][:count]
         for index, node in enumerate(nodes):
             node["reading"] = reading + index % 2 / 100

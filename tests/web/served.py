@@ -20,8 +20,9 @@ ESTABLISHED = "01"  # in /proc/net/tcp
 
 class Server:
     """
-    Serves a machine on a port of the loopback address, with a history: `past` returns the reading of
-    a node some seconds ago; without it, the history begins now. Follows the changes of the machine.
+    Serves a machine on a port of the loopback address, with a history: `past` returns the reading
+    of a node some seconds ago; without it, the history begins now. Follows the changes of the
+    machine.
     """
 
     def __init__(self, machine, past=None, is_history_kept=True):
