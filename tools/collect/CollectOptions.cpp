@@ -40,6 +40,18 @@ void CollectOptions::addTo(CLI::App& parser)
     parser.footer(collectFooter);
 }
 
+std::optional<int> CollectOptions::parse(int argc, const char* const* argv)
+{
+    CLI::App parser("Reads the sensors of the BMC", "sensorctl collect");
+    addTo(parser);
+    try {
+        parser.parse(argc, argv);
+        return std::nullopt;
+    } catch (const CLI::ParseError& error) {
+        return parser.exit(error);
+    }
+}
+
 std::vector<std::string> CollectOptions::words() const
 {
     std::vector<std::string> words = {"--output", file, "--interval", std::to_string(interval)};

@@ -4,6 +4,7 @@
 
 #include "platform/instrumentation/ipmi/IpmiSource.h"
 
+#include <optional>
 #include <string>
 #include <vector>
 
@@ -28,6 +29,10 @@ struct CollectOptions {
 
     // Adds the options; the object must outlive the parser.
     void addTo(CLI::App& parser);
+
+    // Reads the command line of the program. Returns its exit status where there is nothing left to
+    // do: after --help, or a mistake, which it reports to standard error.
+    std::optional<int> parse(int argc, const char* const* argv);
 
     // Returns the words of a command line with these options.
     std::vector<std::string> words() const;

@@ -12,8 +12,6 @@
 #include "tools/output/Output.h"
 #include "tools/serve/ServiceManager.h"
 
-#include <CLI/CLI.hpp>
-
 #include <algorithm>
 #include <chrono>
 #include <csignal>
@@ -158,15 +156,10 @@ private:
 int collect(int argc, const char* const* argv)
 {
     CollectOptions options;
-    CLI::App parser("Reads the sensors of the BMC", "sensorctl collect");
-    options.addTo(parser);
-    try {
-        parser.parse(argc, argv);
-        Collection(options).run();
-        return EXIT_SUCCESS;
-    } catch (const CLI::ParseError& error) {
-        return parser.exit(error);
-    }
+    if (const std::optional<int> ended = options.parse(argc, argv))
+        return *ended;
+    Collection(options).run();
+    return EXIT_SUCCESS;
 }
 
 } // namespace
