@@ -4,6 +4,9 @@
 // by libsensors and by the program `sensors`. Prints a table of medians for each machine.
 //
 //     bench_hwmon [rounds]
+//
+// `bench_hwmon list` is one of the programs of the table: it does what no program that lists the
+// sensors by libsensors can do without.
 
 #include "bench/HwmonTree.h"
 #include "bench/Median.h"
@@ -38,8 +41,10 @@
 #include <ctime>
 #include <exception>
 #include <functional>
+#include <memory>
 #include <stdexcept>
 #include <string>
+#include <string_view>
 #include <vector>
 
 namespace {
@@ -125,6 +130,31 @@ void readBySubfeatures(std::size_t attributes)
         }
     }
     expect(read == attributes, "another number of subfeatures");
+}
+
+// Lists the chips and labels by libsensors, as it finds its configuration, and reads each attribute
+// from the descriptor of its chip's folder.
+void listAndRead()
+{
+    expect(sensors_init(nullptr) == 0, "a failed sensors_init");
+    std::array<char, 64> text{};
+    int chipNumber = 0;
+    while (const auto* const chip = sensors_get_detected_chips(nullptr, &chipNumber)) {
+        const Vorn::Descriptor folder(::open(chip->path, O_RDONLY | O_DIRECTORY));
+        int featureNumber = 0;
+        while (const auto* const feature = sensors_get_features(chip, &featureNumber)) {
+            const std::unique_ptr<char, decltype(&std::free)> label(
+                sensors_get_label(chip, feature), &std::free);
+            expect(label != nullptr, "a feature without a label");
+            int number = 0;
+            while (const auto* const each = sensors_get_all_subfeatures(chip, feature, &number)) {
+                const Vorn::Descriptor file(::openat(folder.number(), each->name, O_RDONLY));
+                expect(
+                    ::read(file.number(), text.data(), text.size()) > 0, "an unreadable attribute");
+            }
+        }
+    }
+    sensors_cleanup();
 }
 
 void harvest(std::size_t sensors)
@@ -279,6 +309,8 @@ void compare(const HwmonTree& tree, std::size_t rounds)
         {"GET /metrics of the server", "EnumInstances",
             [&] { return costOf(scrape, clockOf(server.id())); }},
         {"sensors -j", "sensors -j", [] { return program("/usr/bin/sensors", {"-j"}); }},
+        {"libsensors' list and raw reads", "sensors -j",
+            [] { return program("/proc/self/exe", {"list"}); }},
         {"sensorctl list", "sensors -j", [] { return program(Testing::sensorctl, {"list"}); }},
         {"sensorctl list --json", "sensors -j", [] {
              return program(Testing::sensorctl, {"list", "--json"});
@@ -292,6 +324,10 @@ void compare(const HwmonTree& tree, std::size_t rounds)
 int main(int argc, char** argv)
 {
     try {
+        if (argc > 1 && std::string_view(argv[1]) == "list") {
+            listAndRead();
+            return 0;
+        }
         Tools::keepFreedMemory(1); // as in the server
         RynLog::configure({6000, "off", "off"});
         const Testing::EnvironmentVariable hardware("VORN_INSTRUMENTATION", "hwmon");
