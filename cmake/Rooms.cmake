@@ -16,16 +16,22 @@ function(sensor_profile_room name)
   endif()
 endfunction()
 
-# sensor_profile_test(NAME [FILES_APART] SOURCES ... USES libraries ... [ENVIRONMENT variables ...])
+# sensor_profile_test(NAME [FILES_APART] [SINGLE_THREADED] SOURCES ... USES libraries ...
+#                     [ENVIRONMENT variables ...])
 # Adds one GoogleTest executable and registers it with CTest. The test framework's headers, which take
-# most of the time of each test file, are compiled once and shared.
+# most of the time of each test file, are compiled once and shared. The thread sanitizer has nothing
+# to find in SINGLE_THREADED tests, so that it does without them.
 function(sensor_profile_test name)
-  cmake_parse_arguments(test "FILES_APART" "" "SOURCES;USES;ENVIRONMENT" ${ARGN})
+  cmake_parse_arguments(test "FILES_APART;SINGLE_THREADED" "" "SOURCES;USES;ENVIRONMENT" ${ARGN})
   sensor_profile_test_executable(${name} ${test_SOURCES})
   target_precompile_headers(${name} REUSE_FROM test_headers)
   target_link_libraries(${name} PRIVATE ${test_USES} support_log)
   if(test_FILES_APART)
     set_target_properties(${name} PROPERTIES UNITY_BUILD OFF)
+  endif()
+  if(test_SINGLE_THREADED AND SENSOR_PROFILE_SANITIZE MATCHES "thread")
+    set_target_properties(${name} PROPERTIES EXCLUDE_FROM_ALL TRUE)
+    return()
   endif()
   add_test(NAME ${name} COMMAND ${name})
   # The settings of the environment must not reach the tests.
@@ -44,6 +50,10 @@ function(sensor_profile_test_executable name)
   target_link_libraries(${name} PRIVATE GTest::gmock GTest::gtest_main)
   # Optimising the tests would only take time, and _FORTIFY_SOURCE needs optimisation.
   target_compile_options(${name} PRIVATE -O0 -U_FORTIFY_SOURCE)
+  if(SENSOR_PROFILE_FUZZ)
+    # Fuzzers are guided by the coverage of the rooms, not of the tests.
+    target_compile_options(${name} PRIVATE -fno-sanitize=fuzzer-no-link)
+  endif()
   target_compile_definitions(${name} PRIVATE
     SENSOR_PROFILE_SOURCE_DIR="${PROJECT_SOURCE_DIR}"
     SENSOR_PROFILE_BINARY_DIR="${PROJECT_BINARY_DIR}")
