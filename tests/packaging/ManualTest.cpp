@@ -25,7 +25,8 @@ std::string rendered(const std::string& page)
 
 std::set<std::string> longOptions(const std::string& text)
 {
-    static const std::regex option("--[a-z][a-z-]*");
+    // Those of node_exporter have a dot.
+    static const std::regex option("--[a-z][a-z-]*(?![a-z-]|\\.[a-z])");
     std::set<std::string> options;
     for (std::sregex_iterator each(text.begin(), text.end(), option), end; each != end; ++each)
         options.insert(each->str());
