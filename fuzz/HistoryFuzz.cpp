@@ -33,13 +33,13 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
         sensor.reading = Quantity{1, 0};
         const auto next = std::chrono::seconds(secondsOfSlot * (newest + 1));
         history.add({&sensor}, std::chrono::system_clock::time_point(next));
-        for (const std::string& deviceId : history.deviceIds())
-            history.visit(deviceId, [&](const Samples& samples, Slot last) {
-                std::string json;
-                appendHour(json, deviceId, samples, last);
-                appendThinnedHour(json, deviceId, samples, last);
-                appendDay(json, deviceId, samples, last);
-            });
+        const auto write = [](const std::string& deviceId, const Samples& samples, Slot last) {
+            std::string json;
+            appendHour(json, deviceId, samples, last);
+            appendThinnedHour(json, deviceId, samples, last);
+            appendDay(json, deviceId, samples, last);
+        };
+        history.visit(history.deviceIds(), write);
         storeHistory(history, [](const void*, std::size_t) {});
     } catch (const std::runtime_error&) {
         return 0;
