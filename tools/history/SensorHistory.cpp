@@ -11,7 +11,7 @@ namespace Tools {
 namespace {
 
 constexpr Slot slotsUntilForgotten = Samples::minutesKept * slotsOfMinute;
-constexpr Slot slotsOfDelay = 5 * slotsOfMinute;
+constexpr Slot slotsOfDelay = Slot{5} * slotsOfMinute;
 constexpr std::chrono::hours clockTimeout{1};
 
 // Clears the slots after the first one until the last one, and their minutes.
