@@ -46,16 +46,22 @@ ClientConnection* Connections::add(
     int descriptor, const Address& client, std::shared_ptr<const Certificate> certificate)
 {
     std::unique_lock lock(mutex_);
-    const std::size_t count = all_.size();
-    const bool areTooMany = count >= limits_.maximumConnections;
-    if (areTooMany || exceedsLimitOfAddress(client)) {
+    const bool isRoomForAll =
+        makeRoomAmong([](const ClientConnection&) { return true; }, limits_.maximumConnections);
+    const bool isRoom =
+        isRoomForAll &&
+        makeRoomAmong([network = client.network()](
+                          const ClientConnection& each) { return each.network == network; },
+            limits_.maximumConnectionsPerAddress);
+    if (!isRoom) {
+        const std::size_t count = all_.size();
         ::shutdown(descriptor, SHUT_RDWR);
         lock.unlock();
         if (refusals_.allowsReport())
             report({"add", "Connections", __LINE__},
                 "refused a connection from " + client.host() + ": there are " +
                     std::to_string(count) +
-                    (areTooMany ? "" : ", too many of them from this address"));
+                    (isRoomForAll ? ", too many of them from this address" : ""));
         return nullptr;
     }
     ClientConnection& connection = all_.emplace_back(descriptor, client, std::move(certificate));
@@ -68,13 +74,26 @@ ClientConnection* Connections::add(
     return &connection;
 }
 
-bool Connections::exceedsLimitOfAddress(const Address& client) const
+template <typename Counts>
+bool Connections::makeRoomAmong(const Counts& counts, std::size_t maximum)
 {
-    const auto ofNetwork = std::count_if(
-        all_.begin(), all_.end(), [network = client.network()](const ClientConnection& each) {
-            return each.network == network;
-        });
-    return static_cast<std::size_t>(ofNetwork) >= limits_.maximumConnectionsPerAddress;
+    std::size_t count = 0;
+    ClientConnection* oldest = nullptr;
+    for (ClientConnection& each : all_) {
+        if (each.isLeaving || !counts(each))
+            continue;
+        ++count;
+        const bool isIdle = each.phase == Phase::idle && each.hasFetched;
+        if (isIdle && (oldest == nullptr || each.deadline < oldest->deadline))
+            oldest = &each;
+    }
+    if (count < maximum)
+        return true;
+    if (oldest == nullptr)
+        return false;
+    oldest->isLeaving = true;
+    ::shutdown(oldest->descriptor, SHUT_RDWR);
+    return true;
 }
 
 void Connections::remove(ClientConnection& connection)
@@ -98,6 +117,7 @@ void Connections::enter(ClientConnection& connection, Phase phase)
     if (phase == Phase::idle && isShuttingDown_)
         ::shutdown(connection.descriptor, SHUT_RD);
     connection.phase = phase;
+    connection.hasFetched = connection.hasFetched || phase == Phase::fetching;
     const bool isLastPiece = isShuttingDown_ && connection.stream != nullptr;
     connection.deadline = Clock::now() + timeoutOf(isLastPiece ? Phase::receiving : phase);
 }

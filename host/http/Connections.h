@@ -51,7 +51,9 @@ struct ClientConnection {
     // Guarded by the mutex of Connections.
     Phase phase = Phase::idle;
     std::chrono::steady_clock::time_point deadline{};
-    Stream* stream = nullptr; // that is the answer
+    Stream* stream = nullptr; // of the answer
+    bool hasFetched = false;  // a resource, as browsers do, which connect again
+    bool isLeaving = false;   // closed to make room, and no longer counted
 
     // Used by the connection's thread only.
     std::string target; // of the request that arrives
@@ -105,7 +107,10 @@ private:
     // Returns what is to be logged.
     std::vector<std::string> closeOverdue();
     std::chrono::seconds timeoutOf(Phase phase) const;
-    bool exceedsLimitOfAddress(const Address& client) const;
+    // Returns whether there is room for one more connection of those that count, for which the one
+    // of them that has been idle the longest is closed where need be (RFC 9112, 9.5).
+    template <typename Counts>
+    bool makeRoomAmong(const Counts& counts, std::size_t maximum);
     bool exceedsLimitsOfStreams(const ClientConnection& connection) const;
     // Ends what the connection waits for.
     void interrupt(ClientConnection& connection);

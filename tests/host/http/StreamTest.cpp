@@ -4,6 +4,7 @@
 
 #include "host/http/ResourceCheck.h"
 #include "tests/host/http/HttpTest.h"
+#include "tests/support/ErrorOf.h"
 #include "tests/support/WaitUntil.h"
 
 #include <condition_variable>
@@ -65,11 +66,23 @@ public:
     Source source;
 };
 
+class FileResource : public Host::Http::Resource {
+public:
+    Host::Http::Representation represent(const RequestHead&) override
+    {
+        return {{}, std::make_shared<const std::string>("file")};
+    }
+};
+
 const std::string request = "GET /stream HTTP/1.1\r\nHost: localhost\r\n\r\n";
 
 class StreamTest : public HttpTest {
 protected:
-    StreamTest() { resources.emplace("/stream", stream); }
+    StreamTest()
+    {
+        resources.emplace("/stream", stream);
+        resources.emplace("/file", file);
+    }
     void TearDown() override { server.reset(); } // which uses the stream
 
     HttpClient openStream()
@@ -97,6 +110,7 @@ protected:
     }
 
     StreamResource stream;
+    FileResource file;
 };
 
 TEST_F(StreamTest, PiecesArriveWhenTheyComeIntoBeing)
@@ -198,6 +212,27 @@ TEST_F(StreamTest, HalfOfAllConnectionsStayFreeForOtherRequests)
     const HttpClient first = openStream();
     ASSERT_TRUE(waitForOpen(1));
     EXPECT_EQ(ask(request).status, 503);
+}
+
+TEST_F(StreamTest, ConnectionsThatBrowsersLeaveIdleMakeRoom)
+{
+    limits.maximumConnectionsPerAddress = 4;
+    start();
+    std::vector<HttpClient> clients;
+    for (int i = 0; i < 4; ++i) {
+        clients.push_back(connect());
+        clients.back().send(post());
+        EXPECT_EQ(clients.back().receive().status, 200);
+    }
+    const std::string getFile = "GET /file HTTP/1.1\r\nHost: localhost\r\n\r\n";
+    clients[2].send(getFile);
+    EXPECT_EQ(clients[2].receive().status, 200);
+    // The server may regard the connection as idle only some time after the answer has arrived.
+    EXPECT_TRUE(Testing::waitUntil(
+        [&] { return Testing::errorOf([&] { EXPECT_EQ(ask(post()).status, 200); }).empty(); }));
+    EXPECT_TRUE(clients[2].isClosed());
+    clients[0].send(post());
+    EXPECT_EQ(clients[0].receive().status, 200);
 }
 
 TEST_F(StreamTest, HeadOpensNone)
