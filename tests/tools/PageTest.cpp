@@ -232,6 +232,30 @@ TEST_F(PageTest, HundredOpenPagesTakeLessThanTwentyMegabytes)
 }
 #endif
 
+#ifdef SENSOR_PROFILE_MEMORY_IS_EXACT
+TEST_F(PageTest, HistoryTakesLessThanTwentyFiveKilobytesForASensor)
+{
+    constexpr std::size_t count = 2000;
+    std::string nodes;
+    for (std::size_t i = 0; i < count; ++i)
+        nodes += (i > 0 ? ", " : "") +
+                 (R"({ "type": "voltage", "status": 1, "reading": 12.5, "path": "/c/)" +
+                     std::to_string(i) + R"(", "description": "V )" + std::to_string(i) + "\" }");
+    const std::string file = model(nodes);
+    const auto residentWith = [&](const std::string& history) {
+        const std::string folder = (folder_.path() / history).string();
+        std::filesystem::create_directory(folder);
+        const ServerProcess server(
+            {"--model", file, "--history", history == "off" ? history : folder});
+        EXPECT_TRUE(waitUntil(
+            [&] { return history == "off" || read(server, thinnedHour()).body.size() > count; }));
+        EXPECT_EQ(readJson(server, "/api/sensors").size(), count);
+        return server.residentKilobytes();
+    };
+    EXPECT_LT(residentWith("kept"), residentWith("off") + 25 * count);
+}
+#endif
+
 TEST_F(PageTest, EndOfTheServerEndsTheStreams)
 {
     ServerProcess server(withModel());
