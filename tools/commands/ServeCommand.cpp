@@ -136,7 +136,7 @@ bool serve(Host::Http::Server& server, const Protection& protection, const Signa
 class ServeCommand : public Command {
 public:
     explicit ServeCommand(CLI::App& tool)
-        : Command(tool, "serve", "Answer CIM clients over HTTP, and Prometheus at /metrics")
+        : Command(tool, "serve", "Answer CIM clients, browsers and Prometheus over HTTP")
     {
         options_.addTo(parser());
         source_.addModel(parser());
