@@ -195,6 +195,8 @@ TEST_F(MetricsTest, SourceThatFailsTakesNoSensorsOfOthersAway)
     }
     EXPECT_EQ(sourcesIn(metricsOfSources(whole + "," + whole)), (States{{whole, 1}}));
     EXPECT_EQ(sourcesIn(metricsOfSources(broken)), (States{{broken, 0}}));
+    EXPECT_EQ(
+        sourcesIn(metricsOfSources("hwmon:fast," + whole)), (States{{"hwmon", 0}, {whole, 1}}));
 }
 
 TEST_F(MetricsTest, OddDescriptionsAreThoseOfTheProvider)

@@ -16,7 +16,7 @@ namespace Tools {
 
 // Finds the devices of chips on the present machine: the model of a disk or battery, the name of a
 // network interface or of a PCI slot. What a chip never changes is read once, as long as the chip
-// stays: on a machine of many chips, that took as long as reading their sensors. Not thread-safe.
+// stays, so that a server does not follow the links of all chips for each scrape. Not thread-safe.
 class ChipDevices {
 public:
     // Sets the devices of the sensors' chips. Leaves out what cannot be read.
@@ -43,6 +43,7 @@ private:
     std::map<std::string, std::string> slotAt_; // the name of the slot by its address
 };
 
+// Sets the devices once.
 inline void nameDevices(Sensors& sensors)
 {
     ChipDevices().nameIn(sensors);

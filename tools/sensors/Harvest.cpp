@@ -53,6 +53,7 @@ bool isUp(const Vorn::SourceEntry& entry, const Identifiers& harvested)
         return harvested.contains(deviceIdOf(node.description, node.path));
     };
     try {
+        const auto source = Vorn::openSource(entry);
         if (entry.scheme == "hwmon" && !isLibsensorsPrivate) {
             Vorn::Hwmon::presentMachine(); // throws where the chips cannot be listed
             return true;
@@ -62,7 +63,6 @@ bool isUp(const Vorn::SourceEntry& entry, const Identifiers& harvested)
             return std::all_of(catalogue->features.begin(), catalogue->features.end(),
                 [&](const auto& feature) { return isHarvested(feature.node); });
         }
-        const auto source = Vorn::openSource(entry);
         for (const NodeType type : {NodeType::Temperature, NodeType::Voltage, NodeType::Tachometer})
             for (const Vorn::Node& node : source->nodes(type))
                 if (!isHarvested(node))
