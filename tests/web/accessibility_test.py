@@ -60,7 +60,7 @@ class AccessibilityTest(PageTest):
                   ".map(each => each.textContent).join()")
         whole = self.run_script(labels)
         self.press(Keys.ENTER)
-        self.wait_for(f"{labels} !== arguments[0]", 3, whole)
+        self.wait_for(f"{labels} !== arguments[0]", 10, whole)
         self.press(Keys.ESCAPE)
         self.assertTrue(self.run_script("document.querySelector('#chart').hidden"))
         self.assertTrue(self.run_script("document.activeElement.matches('#troubles button')"))

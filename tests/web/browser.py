@@ -134,6 +134,7 @@ def cannot_run(test, reason):
     """Skips a test that cannot run here; fails it in CI, which runs all tests."""
     if os.environ.get("CI"):
         test.fail(f"{reason}; CI must not skip")
+    print(f"\nSKIPPED: {reason}")
     test.skipTest(reason)
 
 

@@ -81,17 +81,17 @@ class ChartTest(PageTest):
         plot = self.driver.find_element("id", "plot")
         ActionChains(self.driver, duration=50).move_to_element(plot).click_and_hold(
         ).move_by_offset(150, 0).release().perform()
-        self.wait_for(f"{AXIS}.join() !== arguments[0]", 3, whole)
+        self.wait_for(f"{AXIS}.join() !== arguments[0]", 10, whole)
         self.wait_for("/°C \\(.*:.*:/.test("
-                      "document.querySelector('#compared .value').textContent)", 3)
+                      "document.querySelector('#compared .value').textContent)")
         self.driver.find_element("css selector", "[data-zoom=all]").click()
-        self.wait_for(f"{AXIS}.join() === arguments[0]", 3, whole)
+        self.wait_for(f"{AXIS}.join() === arguments[0]", 10, whole)
 
     def test_shows_the_last_day(self):
         self.open_chart("?device=" + CPU2)
         hour = self.run_script(AXIS)
         self.driver.find_element("css selector", "[data-span=day]").click()
-        self.wait_for(f"{AXIS}.join() !== arguments[0]", 5, ",".join(hour))
+        self.wait_for(f"{AXIS}.join() !== arguments[0]", 10, ",".join(hour))
         self.assertIn("span=day", self.driver.current_url)
         self.assertEqual("true", self.run_script(
             "document.querySelector('[data-span=day]').ariaPressed"))
@@ -104,12 +104,6 @@ class ChartTest(PageTest):
             for name in ("--critical", "--warning-band"):
                 with self.subTest(name, scheme=scheme):
                     self.wait_for(DRAWS, 5, name)
-
-    def test_follows_the_readings(self):
-        machine = Machine.demonstration()
-        self.open_chart("?device=" + CPU1, self.serve(machine))
-        machine.set_reading("/system/cpu1/package", 240)
-        self.wait_for("document.querySelector('#compared .value').textContent.startsWith('240')", 5)
 
     def test_names_the_sensors_that_are_missing(self):
         self.open_chart("?device=none:/a&device=" + CPU2 + "&device=" + CPU2)

@@ -28,7 +28,12 @@ class LiveTest(PageTest):
     def trouble_text(self, label):
         return self.wait_for("[...document.querySelectorAll('#troubles .sensor')].find("
                              "row => row.textContent.includes(arguments[0]) && "
-                             "row.querySelector('.since').textContent)?.innerText", 3, label)
+                             "row.querySelector('.since').textContent)?.innerText", 10, label)
+
+    def seconds_until(self, condition):
+        begin = time.monotonic()
+        self.wait_for(condition)
+        return time.monotonic() - begin
 
     def lost(self, number):
         return ("document.querySelector('#counts [data-urgency=lost]')"
@@ -51,7 +56,7 @@ class LiveTest(PageTest):
             removed = self.machine.remove_chip("/system/psu1")
             self.machine.add([{"type": "temperature", "path": "/system/cpu10/t", "baseUnits": 2,
                                "description": "CPU 10", "status": 1, "reading": 40}])
-        self.wait_for(f"{TROUBLES}.includes('System Fan 1')", 3)
+        seconds = [self.seconds_until(f"{TROUBLES}.includes('System Fan 1')")]
         self.assertIn("450\u00a0RPM", self.row_text("System Fan 1"))
         self.assertIn("Critical low", self.row_text("System Fan 1"))
         self.assertEqual(
@@ -68,22 +73,27 @@ class LiveTest(PageTest):
         place = titles.index("system/cpu10")
         self.assertEqual(["system/cpu2", "system/nic1"], [titles[place - 1], titles[place + 1]])
         self.wait_for("document.querySelector('#announcement').textContent"
-                      ".includes('Critical low')", 3)
+                      ".includes('Critical low')")
 
         with self.machine.changes():
             self.machine.set_reading(FAN, 5300)
             self.machine.add(removed)
-        self.wait_for(f"!{TROUBLES}.includes('System Fan 1')", 3)
+        seconds.append(self.seconds_until(f"!{TROUBLES}.includes('System Fan 1')"))
+        self.assertLess(min(seconds), 3)  # the machine may be busy during one of them
         self.assertTrue(self.run_script(self.lost(2)))
         self.assertIn("7936\u00a0RPM", self.row_text("PSU 1 Fan"))
 
-    def test_shows_a_sensor_that_becomes_a_problem_among_those_found(self):
-        shown = "document.querySelector('#found').innerText"
-        self.open(self.server, "?problems=1&search=kind:fan")
-        self.assertEqual("Shown: 2", self.run_script(shown))
+    def test_shows_a_change_among_those_found_and_in_the_chart(self):
+        found = "document.querySelector('#found').innerText"
+        self.open(self.server,
+                  "?problems=1&search=kind:fan&device=System Fan 5:/system/fan5")
+        self.wait_for("document.querySelector('#plot canvas')")
+        self.assertEqual("Shown: 2", self.run_script(found))
         self.machine.set_reading("/system/fan5", 100)
-        self.wait_for(f"{shown} === 'Shown: 3'", 3)
+        self.wait_for(f"{found} === 'Shown: 3'")
         self.assertTrue(self.row_text("System Fan 5"))
+        self.assertEqual("100\u00a0RPM", self.run_script(
+            "document.querySelector('#compared .value').textContent"))
 
     def test_does_not_take_the_begin_of_the_history_for_that_of_a_state(self):
         script = """
@@ -106,11 +116,11 @@ class LiveTest(PageTest):
                                 "ERR_CONNECTION_RESET", "ERR_EMPTY_RESPONSE")
         self.server.stop()
         self.wait_for("/^Connection lost since \\d/.test("
-                      "document.querySelector('#connection').textContent)", 3)
+                      "document.querySelector('#connection').textContent)")
         self.machine.set_reading(FAN, 600)
         removed = self.machine.remove_chip("/system/nic1")
         self.server.start()
-        self.wait_for("document.querySelector('#connection').textContent === 'Live'", 6)
+        self.wait_for("document.querySelector('#connection').textContent === 'Live'")
         self.assertIn("Warning low", self.row_text("System Fan 1"))
         self.assertIn("Gone", self.row_text(removed[0]["description"]))
         self.assertIn("since before", self.run_script(
@@ -127,4 +137,4 @@ class LiveTest(PageTest):
         self.machine.set_reading(FAN, 450)
         self.driver.switch_to.window(page)
         self.assertEqual(0, hidden)
-        self.wait_for(f"{TROUBLES}.includes('System Fan 1')", 3)
+        self.wait_for(f"{TROUBLES}.includes('System Fan 1')")
