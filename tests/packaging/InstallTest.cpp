@@ -65,9 +65,13 @@ TEST(InstalledTest, AreTheProviderAndTheTool)
     std::vector<std::string> all = providerFiles;
     all.insert(all.end(), toolFiles.begin(), toolFiles.end());
     all.emplace_back("share/doc/sensor-profile-provider/LICENSE");
-    for (const std::string& name :
-        filesBelow(SENSOR_PROFILE_BINARY_DIR "/share/sensor-profile/web"))
-        all.push_back("share/sensor-profile/web/" + name);
+    const std::string web = "share/sensor-profile/web/";
+    std::vector<std::string> served = filesBelow(SENSOR_PROFILE_SOURCE_DIR "/web");
+    std::erase(served, "CMakeLists.txt");
+    served.emplace_back("dygraph.min.js");
+    for (const std::string& name : served)
+        all.insert(all.end(), {web + name, web + name + ".gz"});
+    all.push_back(web + "dygraphs-copyright.txt");
     std::sort(all.begin(), all.end());
     EXPECT_THAT(filesBelow(movedInstallation()), ElementsAreArray(all));
 }

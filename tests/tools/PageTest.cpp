@@ -2,6 +2,7 @@
 
 // The page of `sensorctl serve` and what it is fed from, as browsers read them.
 
+#include "tests/support/TlsClient.h"
 #include "tests/support/WaitUntil.h"
 #include "tests/tools/ServeTest.h"
 
@@ -114,7 +115,8 @@ TEST_F(PageTest, NothingOfItIsFromElsewhere)
 
 TEST_F(PageTest, AllOfItNeedsASignIn)
 {
-    const ServerProcess server(withModel({"--passwords", secret("passwords", userLine)}));
+    const ServerProcess server(
+        encrypted("localhost", {"--passwords", secret("passwords", userLine)}));
     for (const char* const target :
         {"/", "/web/Main.js", "/api/sensors", "/api/events", "/api/history?span=hour&points=60"}) {
         const HttpReply reply = read(server, target);
@@ -123,6 +125,15 @@ TEST_F(PageTest, AllOfItNeedsASignIn)
     }
     EXPECT_EQ(read(server, "/", asAnn).status, 200);
     EXPECT_EQ(read(server, "/web/Main.js", asAnn).status, 200);
+
+    TlsClient client(server.port("https"));
+    client.send(get("/api/events", asAnn));
+    std::string received;
+    while (received.find("event: sensors") == std::string::npos) {
+        const std::string part = client.receiveSome();
+        ASSERT_NE(part, "");
+        received += part;
+    }
 }
 
 TEST_F(PageTest, IsInThePreferredLanguage)
