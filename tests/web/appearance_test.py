@@ -28,6 +28,10 @@ class AppearanceTest(PageTest):
                 self.assertEqual(width, self.run_script("innerWidth"))
                 self.assertLessEqual(
                     self.run_script("document.documentElement.scrollWidth"), width)
+                if width >= 1280:
+                    self.assertEqual([], self.run_script(
+                        "[...document.querySelectorAll('.name button')].filter("
+                        "name => name.scrollWidth > name.clientWidth).map(name => name.innerText)"))
                 color = self.run_script("getComputedStyle(document.body).backgroundColor")
                 brightness = sum(map(int, re.findall(r"\d+", color)))
                 if scheme == "light":
