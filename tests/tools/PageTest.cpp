@@ -318,15 +318,23 @@ TEST_F(PageTest, DamagedHistoryIsReportedAndBeginsAnew)
     EXPECT_EQ(contentOf((folder_.path() / "history.bad").string()), "damaged");
 }
 
-TEST_F(PageTest, FolderThatCannotBeWrittenIsRefused)
+TEST_F(PageTest, FolderOfTheHistoryMustExist)
 {
-    auto arguments = withModel({"--history", "/proc/none"});
+    const Ended ended = failing(withModel({"--history", "/proc/none", "--check"}));
+    EXPECT_EQ(ended.code, 2);
+    EXPECT_THAT(
+        ended.err, HasSubstr("--history needs a folder or off: there is no folder /proc/none"));
+}
+
+TEST_F(PageTest, FolderOfTheHistoryIsThatOfOneServer)
+{
+    auto arguments = withModel({"--history", folder_.path().string(), "--port", "0"});
     if (::geteuid() == 0)
         arguments.insert(arguments.end(), {"--user", "root"});
+    const ServerProcess server(arguments);
     const Ended ended = failing(arguments);
     EXPECT_EQ(ended.code, 1);
-    EXPECT_EQ(
-        ended.err, "sensorctl: cannot keep the history in /proc/none: No such file or directory\n");
+    EXPECT_THAT(ended.err, HasSubstr("another process keeps its history there"));
 }
 
 TEST_F(PageTest, HistoryCanBeOff)

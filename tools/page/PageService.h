@@ -35,7 +35,7 @@ public:
     bool finish(std::chrono::milliseconds timeout);
 
 private:
-    // Answers that the page is not there.
+    // Refuses requests with the reason why there is no page.
     class AbsentPage : public Host::Http::Resource {
     public:
         Host::Http::Representation represent(const Host::Http::RequestHead& head) override;

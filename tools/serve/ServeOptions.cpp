@@ -10,6 +10,7 @@
 
 #include <cstdint>
 #include <cstdlib>
+#include <filesystem>
 #include <functional>
 #include <memory>
 #include <string_view>
@@ -155,6 +156,8 @@ void ServeOptions::complete(CLI::App& parser)
     if (!history && stateFolders != nullptr && *stateFolders != '\0')
         history =
             std::string_view(stateFolders).substr(0, std::string_view(stateFolders).find(':'));
+    if (history && history != "off" && !std::filesystem::is_directory(*history))
+        throw UsageError("--history needs a folder or off: there is no folder " + *history);
     listen.hasCertificate = certificate.has_value();
     listen.hasPasswords = passwords.has_value();
 }
