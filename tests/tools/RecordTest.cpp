@@ -117,4 +117,20 @@ TEST_F(RecordTest, MachineThatCannotBeReadIsNoEmptyRecord)
     EXPECT_EQ(contentOf(file), "precious");
 }
 
+TEST_F(RecordTest, MachineOfWhichASourceFailsIsNotRecorded)
+{
+    const std::string file = folder_.write("record.json", "precious");
+    const std::string broken = folder_.write("broken.json", "{");
+    const std::string whole = smallModel();
+    for (const std::string& sources :
+        {"model:" + whole + ",model:" + broken, "model:" + broken + ",model:" + whole}) {
+        const RunOptions options{.environment = {{"VORN_INSTRUMENTATION", sources}}};
+        const Ended ended = run({"record", "-o", file}, options);
+        EXPECT_EQ(ended.code, 1);
+        EXPECT_THAT(ended.err, HasSubstr("sensorctl: model file " + broken + ": "));
+        EXPECT_EQ(contentOf(file), "precious");
+        EXPECT_EQ(run({"record"}, options).out, "");
+    }
+}
+
 } // namespace

@@ -11,6 +11,7 @@
 #include <CLI/CLI.hpp>
 
 #include <optional>
+#include <stdexcept>
 #include <string>
 
 namespace Tools {
@@ -35,6 +36,9 @@ public:
         source_.selectMachine();
         const std::string recording = escapeUnprintable(Vorn::recordMachineFile());
         const bool isEmpty = countSensors() == 0;
+        // A record of the other sources is no record of the machine.
+        if (const auto failures = SourceOptions::failures(false); !failures.empty())
+            throw std::runtime_error(failures.front());
         if (!file_ || *file_ == "-")
             out.write(recording);
         else if (!isEmpty) // the file may be the reference of `check --expect`
