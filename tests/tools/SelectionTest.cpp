@@ -84,6 +84,18 @@ TEST_F(SelectionTest, AddressesOfChipsMayBeShortened)
     EXPECT_EQ(labels("nct6798-isa-"), "");
 }
 
+TEST_F(SelectionTest, NumbersOfOtherFoldersAreNoAddresses)
+{
+    const std::string file = model(R"(
+        { "type": "tachometer", "path": "/psu-1/fan1", "description": "A", "status": 1 },
+        { "type": "tachometer", "path": "/psu-01/fan1", "description": "B", "status": 1 },
+        { "type": "tachometer", "path": "/node-2-1/fan1", "description": "C", "status": 1 },
+        { "type": "tachometer", "path": "/node-2-01/fan1", "description": "D", "status": 1 })");
+    for (const char* const chip : {"psu-1", "psu-01", "node-2-1", "node-2-01"})
+        EXPECT_THAT(run({"get", chip, "--model", file}).out,
+            HasSubstr("  Path           /" + std::string(chip) + "/fan1\n"));
+}
+
 TEST_F(SelectionTest, SeveralSelectorsAddUp)
 {
     EXPECT_THAT(idsOf({"cpu 1", "CPU*", "in1"}),

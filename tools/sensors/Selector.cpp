@@ -42,13 +42,28 @@ std::size_t distanceFrom(std::string_view text, std::string_view name)
     return *std::min_element(last.begin(), last.end());
 }
 
+// Returns whether the text ends with a bus of libsensors, which may have a number or a pattern for
+// one: "nct6798-isa", "jc42-i2c-0".
+bool endsWithBus(std::string_view text)
+{
+    std::size_t dash = text.rfind('-');
+    if (dash != std::string::npos &&
+        text.find_first_not_of("0123456789*?", dash + 1) == text.npos) {
+        text = text.substr(0, dash);
+        dash = text.rfind('-');
+    }
+    constexpr std::array<std::string_view, 9> buses = {
+        "i2c", "isa", "pci", "spi", "virtual", "acpi", "hid", "mdio", "scsi"};
+    return dash != std::string::npos &&
+           std::find(buses.begin(), buses.end(), text.substr(dash + 1)) != buses.end();
+}
+
 // Returns the name of a chip with its address as a number without leading zeros, as libsensors
-// compares them: hexadecimal after the last dash, with or without 0x. Returns other names
-// unchanged.
+// compares them: hexadecimal after the bus, with or without 0x. Returns other names unchanged.
 std::string withPlainAddress(const std::string& chip)
 {
     const std::size_t dash = chip.rfind('-');
-    if (dash == std::string::npos)
+    if (dash == std::string::npos || !endsWithBus(std::string_view(chip).substr(0, dash)))
         return chip;
     std::string_view digits = std::string_view(chip).substr(dash + 1);
     if (digits.starts_with("0x") || digits.starts_with("0X"))
@@ -106,10 +121,10 @@ bool SensorFilter::accepts(const Sensor& sensor) const
 std::string nothingMatches(const std::string& selector, const Sensors& sensors)
 {
     std::set<std::tuple<std::size_t, std::size_t, std::string>> nearest; // by distance and length
+    const std::string folded = withSmallLetters(selector);
     for (const Sensor& sensor : sensors)
         for (const std::string& name : {sensor.chip, sensor.label, sensor.path}) {
-            const std::size_t distance =
-                distanceFrom(withSmallLetters(selector), withSmallLetters(name));
+            const std::size_t distance = distanceFrom(folded, withSmallLetters(name));
             if (!selector.empty() && distance <= selector.size() / 3)
                 nearest.emplace(distance, name.size(), name);
             if (nearest.size() > suggestions)
