@@ -5,6 +5,8 @@
 #include "platform/instrumentation/Instrumentation.h"
 #include "tools/SourceOptions.h"
 #include "tools/output/Output.h"
+#include "tools/output/Terminal.h"
+#include "tools/output/Utf8.h"
 
 #include <CLI/CLI.hpp>
 
@@ -91,9 +93,11 @@ ExitCode complainOfNoObject(
     const std::string start =
         quoted(program_invocation_name) + " " + parser.get_name() + givenOptions(parser);
     std::vector<std::string> lines;
-    for (const Sensor& sensor : found.choices)
-        lines.push_back(
-            start + (sensor.deviceId.starts_with('-') ? " -- " : " ") + quoted(sensor.deviceId));
+    for (const Sensor& sensor : found.choices) {
+        const bool isPrinted = printable(sensor.deviceId, isUtf8Locale()) == sensor.deviceId;
+        const std::string& name = isPrinted ? sensor.deviceId : sensor.path;
+        lines.push_back(start + (name.starts_with('-') ? " -- " : " ") + quoted(name));
+    }
     complain(found.complaint, lines);
     return lines.empty() ? ExitCode::nothingFound : ExitCode::failure;
 }

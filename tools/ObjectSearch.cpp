@@ -62,7 +62,7 @@ ObjectFound ObjectSearch::find(const std::string& wanted)
     else if (filter_.isEmpty())
         found.object = capabilities(provider_, wanted);
     found.isMachineEmpty = sensors().empty();
-    if (found.complaint.empty())
+    if (found.object == nullptr && found.complaint.empty())
         found.complaint =
             isRefused ? noneAccepted(filter_, wanted) : nothingMatches(wanted, sensors());
     return found;
@@ -72,8 +72,9 @@ ObjectFound ObjectSearch::findByPath(const Host::ObjectPath& path, const std::st
 {
     ObjectFound found;
     found.object = provider_.instance(path);
-    found.complaint = "there is no object with the path \"" + wanted + "\"";
-    if (found.object != nullptr && !isAccepted(filter_, *found.object)) {
+    if (found.object == nullptr) {
+        found.complaint = "there is no object with the path \"" + wanted + "\"";
+    } else if (!isAccepted(filter_, *found.object)) {
         found.object = nullptr;
         found.complaint = noneAccepted(filter_, wanted);
     }

@@ -170,6 +170,26 @@ TEST_F(GetTest, ChoicesAreQuotedForTheShell)
     EXPECT_THAT(line, testing::EndsWith(R"( -- '-it'\''s:/b')"));
 }
 
+TEST_F(GetTest, ChoicesWorkInEveryLocale)
+{
+    const std::string file = model(R"(
+        { "type": "temperature", "path": "/a/t1", "description": "ÄRGER", "status": 1 },
+        { "type": "temperature", "path": "/b/t5", "description": "ÄRGER", "status": 1 },
+        { "type": "voltage", "path": "/c/in1", "description": "a\u0007b", "status": 1 },
+        { "type": "voltage", "path": "/c/in2", "description": "a\u0007b", "status": 1 })");
+    const auto chosen = [&](const char* selector, const std::string& locale) {
+        const RunOptions options{.environment = {{"LC_ALL", locale}}};
+        const Ended ended = run({"get", "--model", file, selector}, options);
+        return run({"-c", linesOf(ended.err).back()},
+            {.program = "/bin/sh", .environment = {{"LC_ALL", locale}}})
+            .out;
+    };
+    for (const char* const locale : {"C", "C.UTF-8"}) {
+        EXPECT_THAT(chosen("ärger", locale), HasSubstr("  Path           /b/t5\n"));
+        EXPECT_THAT(chosen("a?b", locale), HasSubstr("  Path           /c/in2\n"));
+    }
+}
+
 TEST_F(GetTest, WhatNothingMatchesHasTheNearestNames)
 {
     const Ended ended = got("CPU 3");
