@@ -53,6 +53,22 @@ TEST(HistoryTest, SensorsThatGoAndComeAreChanges)
         "b/S: Missing -> Normal (1)");
 }
 
+TEST(HistoryTest, UnknownSensorsStayAsTheyWere)
+{
+    History history;
+    EXPECT_TRUE(history.update({}, 0, true).empty());
+    history.update({sensorWith("/a/1", 5, normal), sensorWith("/b/1", 6, normal)}, 1);
+    const Sensors others = {sensorWith("/b/1", std::nullopt, lost)};
+    EXPECT_TRUE(history.isSomeAbsent(others));
+    const auto changes = history.update(others, 2, true);
+    ASSERT_EQ(changes.size(), 1U);
+    EXPECT_EQ(changes[0].text, "b/S: Normal -> Lost");
+    EXPECT_EQ(changes[0].urgencyBefore, Urgency::normal);
+    EXPECT_EQ(history.sensors().at(0)->sensor.reading->value, 5);
+    EXPECT_EQ(history.update(others, 3).at(0).text, "a/S: Normal -> Missing");
+    EXPECT_FALSE(history.isSomeAbsent(others));
+}
+
 TEST(HistoryTest, RangeIsThatOfAllReadings)
 {
     History history;

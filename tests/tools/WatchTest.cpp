@@ -206,6 +206,51 @@ TEST_F(WatchTest, SourceThatFailsIsTheReasonInAPipe)
     EXPECT_THAT(ended.err, StartsWith("sensorctl: model file "));
 }
 
+TEST_F(WatchTest, SourceThatFailsLeavesItsSensorsAndThoseOfOthers)
+{
+    change(node(41, 1));
+    folder_.write("other.json", "{ \"nodes\": [" + fan().substr(1) + "] }");
+    folder_.write("torn", "{");
+    folder_.write("whole", contentOf(watched_));
+    folder_.write("stopped",
+        replaced(contentOf(folder_.path() / "other.json"), "\"status\": 1", "\"status\": 13"));
+    const std::string script =
+        "cd " + folder_.path().string() + "; export VORN_INSTRUMENTATION=model:" + watched_ +
+        ",model:$PWD/other.json; " + sensorctl +
+        " watch --interval 0.1 >out 2>err & sleep 0.5; "
+        "lines() { until [ $(wc -l <$1) -ge $2 ]; do sleep 0.1; done; }; "
+        "cp torn next; mv next watched.json; lines err 1; "
+        "cp stopped next; mv next other.json; lines out 1; "
+        "cp whole next; mv next watched.json; sleep 0.5; "
+        "cp torn next; mv next watched.json; lines err 2; sleep 0.3; kill $!; cat out; cat err >&2";
+    const Ended ended =
+        run({"-c", script}, {.program = "/bin/sh", .environment = {{"RYNLOG_LOG", ""}}});
+    EXPECT_EQ(linesOf(ended.out).size(), 1U) << ended.out;
+    EXPECT_THAT(ended.out, HasSubstr("fter: Normal -> Lost"));
+    const auto reasons = linesOf(ended.err);
+    ASSERT_EQ(reasons.size(), 2U) << ended.err;
+    EXPECT_THAT(reasons[0], StartsWith("sensorctl: model file " + watched_ + ":"));
+    EXPECT_EQ(reasons[1], reasons[0]);
+}
+
+TEST_F(WatchTest, ProblemsOfAPipeAreChangesFromOrToOne)
+{
+    change(node(41, 1) + ", " + replaced(replaced(node(41, 1), "CPU 1", "CPU 2"), "cpu", "x"));
+    folder_.write("changed", "{ \"nodes\": [" + node(85, 23) + ", " +
+                                 replaced(replaced(node(41, 0), "CPU 1", "CPU 2"), "cpu", "x") +
+                                 "] }");
+    folder_.write("first", contentOf(watched_));
+    const std::string script =
+        "cd " + folder_.path().string() + "; " + command("C", "--problems") +
+        " >out & sleep 0.5; cp changed next; mv next watched.json; "
+        "lines() { until [ $(wc -l <out) -ge $1 ]; do sleep 0.1; done; }; "
+        "lines 1; cp first next; mv next watched.json; lines 2; sleep 0.3; kill $!; cat out";
+    const auto lines = linesOf(run({"-c", script}, {.program = "/bin/sh"}).out);
+    ASSERT_EQ(lines.size(), 2U);
+    EXPECT_THAT(lines[0], HasSubstr(" cpu/CPU 1: Normal -> Warning high (85 C)"));
+    EXPECT_THAT(lines[1], HasSubstr(" cpu/CPU 1: Warning high -> Normal (41 C)"));
+}
+
 TEST_F(WatchTest, WhatNothingMatchesIsSaidBeforeTheScreenIsTaken)
 {
     change(node(41, 1));

@@ -63,8 +63,8 @@ public:
         : Command(tool, "watch", "Show the sensors and their changes until a key ends it")
     {
         selection_.addTo(parser());
-        parser().add_flag(
-            "--problems", onlyProblems_, "Begin with the problems only, as after the key p");
+        parser().add_flag("--problems", onlyProblems_,
+            "Begin with problems only; in a pipe: their changes");
         parser()
             .add_option("--interval", interval_, "Seconds between two readings (default: 2)")
             ->type_name("SECONDS")
@@ -113,21 +113,9 @@ private:
         return readSensors(*provider, false);
     }
 
-    // Throws std::runtime_error with the reason where the sensors cannot be read. There is no
-    // provider then, and the next call loads it again.
-    Sensors readSelected(std::optional<ProviderClient>& provider) const
+    Sensors selected(const Sensors& all) const
     {
-        Sensors all = readAll(provider);
-        if (all.empty()) {
-            provider.reset();
-            if (countSensors() != 0) // the source may have recovered since
-                all = readAll(provider);
-        }
-        if (all.empty()) {
-            provider.reset();
-            checkMachineIsEmpty();
-        }
-        Sensors sensors = selection_.select(std::move(all)).sensors;
+        Sensors sensors = selection_.select(all).sensors;
         if (SourceOptions::readsHwmon())
             nameDevices(sensors);
         return sensors;
@@ -138,10 +126,24 @@ private:
         std::string failure; // empty when the sensors could be read
     };
 
+    // Updates the history. While a source fails, the sensors that are absent may be its own, and
+    // stay as they were. There is no provider then, and the next call loads it again.
     Renewal renew(std::optional<ProviderClient>& provider, History& history) const
     {
         try {
-            return {history.update(readSelected(provider), std::time(nullptr)), ""};
+            const std::time_t now = std::time(nullptr);
+            Sensors all = readAll(provider);
+            if (all.empty() || history.isSomeAbsent(selected(all))) {
+                provider.reset();
+                if (const auto failures = SourceOptions::failures(false); !failures.empty())
+                    return {history.update(selected(all), now, true), failures.front()};
+                all = readAll(provider); // the source may have recovered since
+            }
+            if (all.empty()) {
+                provider.reset();
+                checkMachineIsEmpty();
+            }
+            return {history.update(selected(all), now), ""};
         } catch (const std::runtime_error& error) {
             return {{}, error.what()};
         }
@@ -155,8 +157,9 @@ private:
         for (;; std::this_thread::sleep_for(std::chrono::duration<double>(interval_))) {
             const Renewal renewal = renew(provider, history);
             for (const Change& change : renewal.changes)
-                out.write(timeStamp(change.time) + " " +
-                          printable(change.text, display_.style().isUtf8) + "\n");
+                if (!onlyProblems_ || isProblem(change.urgency) || isProblem(change.urgencyBefore))
+                    out.write(timeStamp(change.time) + " " +
+                              printable(change.text, display_.style().isUtf8) + "\n");
             out.flush();
             if (!renewal.failure.empty() && renewal.failure != failure)
                 complain(renewal.failure);

@@ -5,6 +5,8 @@
 #include "tools/output/SensorCells.h"
 
 #include <algorithm>
+#include <set>
+#include <string_view>
 
 namespace Tools {
 
@@ -12,41 +14,51 @@ namespace {
 
 constexpr SensorState missingState = {"Missing", Urgency::lost};
 
-Change changeOf(const Sensor& sensor, std::string_view before, std::time_t now)
+Change changeOf(const Sensor& sensor, const SensorState& before, std::time_t now)
 {
     std::string text = sensor.chip + "/" + sensor.label + ": ";
-    text.append(before).append(" -> ").append(sensor.state.word);
+    text.append(before.word).append(" -> ").append(sensor.state.word);
     if (sensor.reading)
         text += " (" + textWithUnit(sensor.reading, sensor) + ")";
-    return {now, text, sensor.state.urgency};
+    return {now, text, sensor.state.urgency, before.urgency};
 }
 
 } // namespace
 
-std::vector<Change> History::update(const Sensors& present, std::time_t now)
+std::vector<Change> History::update(const Sensors& present, std::time_t now, bool areOthersUnknown)
 {
     std::vector<Change> changes;
     std::map<std::string, const Sensor*> byId;
     for (const Sensor& sensor : present) {
         byId.emplace(sensor.deviceId, &sensor);
         const auto [place, isNew] = watched_.try_emplace(sensor.deviceId);
-        const std::string_view before = isNew ? missingState.word : place->second.sensor.state.word;
-        if (!isFirst_ && before != sensor.state.word)
+        const SensorState before = isNew ? missingState : place->second.sensor.state;
+        if (!isFirst_ && before.word != sensor.state.word)
             changes.push_back(changeOf(sensor, before, now));
         take(place->second, sensor);
     }
     for (auto& [id, watched] : watched_) {
-        if (byId.contains(id))
+        if (areOthersUnknown || byId.contains(id))
             continue;
         Sensor gone = watched.sensor;
         gone.state = missingState;
         gone.reading.reset();
         if (watched.sensor.state.word != missingState.word)
-            changes.push_back(changeOf(gone, watched.sensor.state.word, now));
+            changes.push_back(changeOf(gone, watched.sensor.state, now));
         take(watched, gone);
     }
-    isFirst_ = false;
+    isFirst_ = isFirst_ && areOthersUnknown;
     return changes;
+}
+
+bool History::isSomeAbsent(const Sensors& present) const
+{
+    std::set<std::string_view> ids;
+    for (const Sensor& sensor : present)
+        ids.insert(sensor.deviceId);
+    return std::any_of(watched_.begin(), watched_.end(), [&](const auto& each) {
+        return each.second.sensor.state.word != missingState.word && !ids.contains(each.first);
+    });
 }
 
 void History::take(WatchedSensor& watched, const Sensor& present)

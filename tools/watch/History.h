@@ -32,14 +32,19 @@ struct WatchedSensor {
 struct Change {
     std::time_t time;
     std::string text; // such as "chip/label: Normal -> Warning high (91 °C)"
-    Urgency urgency;
+    Urgency urgency;  // of the new state
+    Urgency urgencyBefore = Urgency::normal;
 };
 
 class History {
 public:
-    // Takes the present sensors. Returns what has changed since the last update; nothing in the
-    // first one.
-    std::vector<Change> update(const Sensors& present, std::time_t now);
+    // Takes the present sensors, and the others as missing unless they are unknown. Returns what
+    // has changed since the last update; nothing in the first one that knows all sensors.
+    std::vector<Change> update(
+        const Sensors& present, std::time_t now, bool areOthersUnknown = false);
+
+    // Returns whether a sensor that was there at the last update is not among the present ones.
+    bool isSomeAbsent(const Sensors& present) const;
 
     // Returns the sensors in natural order by chip, label and path.
     std::vector<const WatchedSensor*> sensors() const;
