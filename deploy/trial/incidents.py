@@ -33,20 +33,29 @@ class Incident:
 
 
 class HeatWave(Incident):
-    """Temperatures rise towards their limits for some time, until the cooling fails."""
+    """Temperatures rise to the warning limit, slower to the critical one, and beyond both."""
 
-    rise = 75
+    # In minutes since the begin.
+    until_warning = 50
+    until_critical = 85
 
     def _changed(self, nodes, minute):
-        part = (minute - self.begin) / self.rise
         for node in nodes:
             limits = [node[each] for each in ("upperNonCritical", "upperCritical") if each in node]
             if node["type"] == "temperature" and limits:
-                rise = part * (0.98 * min(limits) - node["reading"])
-                node["reading"] = round(
-                    node["reading"] + rise if part < 1 else 1.1 * max(limits), 2
-                )
+                reading = self._reading(node["reading"], limits, minute - self.begin)
+                node["reading"] = round(reading, 2)
         return nodes
+
+    def _reading(self, healthy, limits, minute):
+        # A chip may have its critical limit below the warning limit.
+        first, last = 0.98 * min(limits), 0.98 * limits[-1]
+        if minute < self.until_warning:
+            return healthy + (first - healthy) * minute / self.until_warning
+        if minute < self.until_critical:
+            part = (minute - self.until_warning) / (self.until_critical - self.until_warning)
+            return first + (last - first) * part
+        return 1.1 * max(limits)
 
 
 class StoppedFan(Incident):
@@ -92,11 +101,11 @@ class SwitchedOff(Incident):
 def incidents_of(racks):
     """Returns what happens to a fleet with these lists of machines, an incident for each rack."""
     with_fan = next(each for each in racks[0] if any(is_watched_fan(node) for node in each.nodes))
-    heat = frozenset({"TemperatureCritical", "HeadroomGone"})
+    heat = frozenset({"TemperatureWarning", "HeadroomGone", "TemperatureCritical"})
     return [
-        StoppedFan((with_fan,), 15, 55, frozenset({"FanStopped"})),
-        HeatWave(tuple(racks[1]), 5, 102, heat),
-        LostSensor((racks[2][0],), 20, 55, frozenset({"SensorLost"})),
-        LostChip((racks[3][0],), 25, 55, frozenset({"ChipGone"})),
-        SwitchedOff((racks[4][0],), 20, 55, frozenset({"MachineGone"})),
+        StoppedFan((with_fan,), 15, 80, frozenset({"FanStopped"})),
+        HeatWave(tuple(racks[1]), 5, 108, heat),
+        LostSensor((racks[2][0],), 20, 80, frozenset({"SensorLost"})),
+        LostChip((racks[3][0],), 15, 80, frozenset({"ChipGone"})),
+        SwitchedOff((racks[4][0],), 20, 80, frozenset({"MachineGone"})),
     ]
