@@ -1,7 +1,7 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Whatever a controller answers, two passes end, and every node has a name and either a finite
-// reading or a status that says why there is none.
+// Whatever a controller answers, and with each workaround, two passes end, and every node has a
+// name and either a finite reading or a status that says why there is none.
 
 #include "tools/collect/Collector.h"
 
@@ -23,7 +23,7 @@ public:
     Ipmi::Bytes send(const Ipmi::Command& /*command*/, std::chrono::milliseconds) override
     {
         if (input_.empty())
-            throw Ipmi::SilentBmc();
+            throw Ipmi::SilentBmc(true);
         const std::size_t length = std::min<std::size_t>(input_[0], input_.size() - 1);
         Ipmi::Bytes answer(input_.begin() + 1, input_.begin() + 1 + static_cast<long>(length));
         input_ = input_.subspan(1 + length);
@@ -51,8 +51,12 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
 
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size)
 {
-    InputTransport transport({data, size});
-    Ipmi::Collector collector({});
+    if (size == 0)
+        return 0;
+    InputTransport transport({data + 1, size - 1});
+    Ipmi::Collector collector({.readsDiscrete = (data[0] & 1U) != 0,
+        .ignoresScanning = (data[0] & 2U) != 0,
+        .assumesBmcOwner = (data[0] & 4U) != 0});
     for (int pass = 0; pass < 2; ++pass) {
         try {
             collector.pass(transport, std::chrono::seconds(10));
