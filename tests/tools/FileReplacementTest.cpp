@@ -4,6 +4,7 @@
 
 #include "tests/support/ErrorOf.h"
 #include "tests/support/TemporaryFolder.h"
+#include "tests/support/Umask.h"
 #include "tests/tools/ToolTest.h"
 
 #include <gmock/gmock.h>
@@ -11,7 +12,9 @@
 
 #include <sys/resource.h>
 #include <sys/stat.h>
+#include <unistd.h>
 
+#include <array>
 #include <csignal>
 
 namespace {
@@ -109,18 +112,32 @@ TEST_F(FileReplacementTest, DoesNotReplaceADevice)
     EXPECT_TRUE(std::filesystem::is_character_file("/dev/null"));
 }
 
+TEST_F(FileReplacementTest, WritesToAPipeThatOnlyALinkOfTheKernelNames)
+{
+    std::array<int, 2> ends{};
+    ASSERT_EQ(::pipe(ends.data()), 0);
+    const Vorn::Descriptor output(ends[0]);
+    const Vorn::Descriptor input(ends[1]);
+    const std::string link = "/dev/fd/" + std::to_string(input.number());
+    replaceFile(link, "once");
+    Tools::RenewedFile(link).renew(" more");
+    std::array<char, 16> content{};
+    EXPECT_EQ(::read(output.number(), content.data(), content.size()), 9);
+    EXPECT_STREQ(content.data(), "once more");
+}
+
 TEST_F(FileReplacementTest, RenewedFileCanBeReadByEverybody)
 {
-    const mode_t mask = ::umask(077);
+    const Testing::Umask umask(077);
+    const Tools::RenewedFile renewed(path("renewed"));
     for (const std::string content : {"first", "second"}) {
-        Tools::renewFile(path("renewed"), content);
+        renewed.renew(content);
         EXPECT_EQ(contentOf(path("renewed")), content);
     }
-    ::umask(mask);
     struct stat status {};
     ::stat(path("renewed").c_str(), &status);
     EXPECT_EQ(status.st_mode & 07777U, 0644U);
-    EXPECT_EQ(files(), 1U);
+    EXPECT_EQ(files(), 2U); // the file and its lock
 }
 
 TEST_F(FileReplacementTest, RenewalRemovesWhatAnEndedProcessLeft)
@@ -132,25 +149,40 @@ TEST_F(FileReplacementTest, RenewalRemovesWhatAnEndedProcessLeft)
             folder_.write("renewed.new", "half a");
         else
             std::filesystem::create_symlink("other", path("renewed.new"));
-        Tools::prepareRenewal(file);
-        EXPECT_EQ(files(), 2U);
+        const Tools::RenewedFile renewed(file);
+        EXPECT_FALSE(std::filesystem::exists(std::filesystem::symlink_status(path("renewed.new"))));
         EXPECT_EQ(contentOf(file), "before");
     }
+    const Tools::RenewedFile renewed(file);
     folder_.write("renewed.new", "half a");
-    Tools::renewFile(file, "after");
+    renewed.renew("after");
     EXPECT_EQ(contentOf(file), "after");
     EXPECT_EQ(contentOf(path("other")), "other");
-    EXPECT_EQ(files(), 2U);
+    EXPECT_EQ(files(), 3U); // with the lock
+}
+
+TEST_F(FileReplacementTest, AFileIsRenewedByOneProcessAtATime)
+{
+    const std::string file = folder_.write("renewed", "before");
+    std::filesystem::create_symlink("renewed", path("link"));
+    {
+        const Tools::RenewedFile first(file);
+        folder_.write("renewed.new", "half a"); // of the first one
+        EXPECT_EQ(Testing::errorOf([&] { const Tools::RenewedFile second(path("link")); }),
+            path("link") + ": another process renews it already");
+        EXPECT_EQ(contentOf(path("renewed.new")), "half a");
+    }
+    EXPECT_NO_THROW(Tools::RenewedFile{file});
 }
 
 TEST_F(FileReplacementTest, NamesTheFileThatCannotBeRenewed)
 {
     const std::string file = path("missing/renewed");
-    EXPECT_EQ(Testing::errorOf([&] { Tools::prepareRenewal(file); }),
+    EXPECT_EQ(Testing::errorOf([&] { const Tools::RenewedFile renewed(file); }),
         file + ": No such file or directory");
-    EXPECT_NO_THROW(Tools::prepareRenewal("/dev/full"));
-    EXPECT_EQ(Testing::errorOf([] { Tools::renewFile("/dev/full", "x"); }),
-        "/dev/full: No space left on device");
+    const Tools::RenewedFile device("/dev/full");
+    EXPECT_EQ(Testing::errorOf([&] { device.renew("x"); }), "/dev/full: No space left on device");
+    EXPECT_FALSE(std::filesystem::exists("/dev/full.lock"));
 }
 
 TEST_F(FileReplacementTest, NamesAFolderAndAnEmptyPath)

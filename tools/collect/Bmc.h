@@ -10,10 +10,18 @@
 
 namespace Ipmi {
 
-// The BMC has not answered for five seconds.
+// The BMC has not answered for five seconds, or its driver reports so without having waited.
 class SilentBmc : public std::runtime_error {
 public:
-    SilentBmc() : std::runtime_error("the BMC does not answer") {}
+    explicit SilentBmc(bool hasWaited)
+        : std::runtime_error("the BMC does not answer"), hasWaited_(hasWaited)
+    {
+    }
+
+    bool hasWaited() const { return hasWaited_; }
+
+private:
+    bool hasWaited_;
 };
 
 // Sends the commands of one pass.

@@ -18,6 +18,7 @@
 #include <cstdlib>
 #include <filesystem>
 #include <optional>
+#include <stdexcept>
 #include <string>
 #include <system_error>
 #include <thread>
@@ -33,7 +34,11 @@ using Period = std::chrono::steady_clock::duration;
 void makeReadableFolder(const std::filesystem::path& folder)
 {
     using std::filesystem::perms;
-    if (std::filesystem::create_directory(folder))
+    std::error_code error;
+    const bool isNew = std::filesystem::create_directory(folder, error);
+    if (error)
+        throw std::runtime_error(folder.string() + ": " + error.message());
+    if (isNew)
         std::filesystem::permissions(folder, perms::owner_all | perms::group_read |
                                                  perms::group_exec | perms::others_read |
                                                  perms::others_exec);
@@ -72,7 +77,7 @@ public:
         device_.emplace();
         if (options_.file == Vorn::defaultCollection)
             makeReadableFolder(std::filesystem::path(options_.file).parent_path());
-        prepareRenewal(options_.file);
+        file_.emplace(options_.file);
         period_ = interval();
         Ipmi::Collector collector({.readsDiscrete = has(discreteReading),
             .ignoresScanning = has(ignoreScanningDisabled),
@@ -128,6 +133,10 @@ private:
         } catch (const std::system_error&) {
             device_.reset(); // the kernel may have removed it
             throw;
+        } catch (const Ipmi::SilentBmc& silence) {
+            if (!silence.hasWaited())
+                device_.reset(); // its connection to the BMC may be lost
+            throw;
         }
         readAt_ = Vorn::secondsSinceStart();
         period_ =
@@ -144,11 +153,12 @@ private:
             return;
         const Vorn::Renewal renewal{std::chrono::duration<double>(period_).count(), *readAt_};
         const auto nodes = options_.isOnlyPresent ? collector.presentNodes() : collector.nodes();
-        renewFile(options_.file, escapeUnprintable(Vorn::writeMachineFile({nodes, renewal})));
+        file_->renew(escapeUnprintable(Vorn::writeMachineFile({nodes, renewal})));
     }
 
     const CollectOptions& options_;
     std::optional<Ipmi::IpmiDevice> device_; // open between passes, too, for its lock
+    std::optional<RenewedFile> file_;
     Period period_{};
     std::optional<double> readAt_; // the end of the last pass that the BMC answered
 };

@@ -5,6 +5,7 @@
 #include "tools/output/Output.h"
 
 #include <fcntl.h>
+#include <sys/file.h>
 #include <sys/stat.h>
 #include <unistd.h>
 
@@ -107,29 +108,46 @@ void writeInPlace(const std::string& path, std::string_view content)
     file.close();
 }
 
-// Calls the action with the target of a path and its type and mode, which are absent where there is
-// nothing. Throws std::runtime_error with the path and the reason.
-template <typename Action>
-void onTarget(const std::string& path, const Action& action)
-{
-    try {
-        const std::string target = std::filesystem::weakly_canonical(path).string();
-        struct stat status {};
-        const bool exists = ::stat(target.c_str(), &status) == 0;
-        action(target, exists ? std::optional(status.st_mode) : std::nullopt);
-    } catch (const std::system_error& error) {
-        throw std::runtime_error(path + ": " + error.code().message());
-    }
-}
-
 bool isReplaceable(const std::optional<::mode_t>& present)
 {
     return !present || S_ISREG(*present);
 }
 
+// Calls the action with the target of a path and its type and mode, which are absent where there is
+// nothing. The target of what is not replaced is the path itself: links such as /dev/stdout lead to
+// pipes, which have no other one. Throws std::runtime_error with the path and the reason.
+template <typename Action>
+void onTarget(const std::string& path, const Action& action)
+{
+    try {
+        struct stat status {};
+        const bool exists = ::stat(path.c_str(), &status) == 0;
+        const std::optional<::mode_t> present =
+            exists ? std::optional(status.st_mode) : std::nullopt;
+        action(isReplaceable(present) ? std::filesystem::weakly_canonical(path).string() : path,
+            present);
+    } catch (const std::system_error& error) {
+        throw std::runtime_error(path + ": " + error.code().message());
+    }
+}
+
 std::string renewalOf(const std::string& target)
 {
     return target + ".new";
+}
+
+// Returns the descriptor that has the lock, none where another process has it. The file is never
+// removed: a process that had opened it would lock another one than the next process.
+Vorn::Descriptor lockOf(const std::string& target)
+{
+    const std::string name = target + ".lock";
+    Vorn::Descriptor lock(::open(name.c_str(), O_RDWR | O_CREAT | O_CLOEXEC | O_NOFOLLOW, 0600));
+    check(lock.number());
+    if (::flock(lock.number(), LOCK_EX | LOCK_NB) == 0)
+        return lock;
+    if (errno == EWOULDBLOCK)
+        return Vorn::Descriptor();
+    throw std::system_error(errno, std::generic_category());
 }
 
 } // namespace
@@ -146,22 +164,26 @@ void replaceFile(const std::string& path, std::string_view content, std::optiona
     });
 }
 
-void renewFile(const std::string& path, std::string_view content)
+RenewedFile::RenewedFile(std::string path) : path_(std::move(path))
+{
+    onTarget(path_, [this](const std::string& target, const std::optional<::mode_t>& present) {
+        if (!isReplaceable(present))
+            return;
+        lock_ = lockOf(target);
+        if (!lock_.isOpen())
+            throw std::runtime_error(path_ + ": another process renews it already");
+        const Replacement removed(target, renewalOf(target));
+    });
+}
+
+void RenewedFile::renew(std::string_view content) const
 {
     constexpr ::mode_t mode = 0644; // whatever the umask
-    onTarget(path, [&](const std::string& target, const std::optional<::mode_t>& present) {
+    onTarget(path_, [&](const std::string& target, const std::optional<::mode_t>& present) {
         if (!isReplaceable(present))
             writeInPlace(target, content);
         else
             Replacement(target, renewalOf(target)).write(content, mode);
-    });
-}
-
-void prepareRenewal(const std::string& path)
-{
-    onTarget(path, [&](const std::string& target, const std::optional<::mode_t>& present) {
-        if (isReplaceable(present))
-            const Replacement removed(target, renewalOf(target));
     });
 }
 

@@ -4,6 +4,8 @@
 
 #pragma once
 
+#include "platform/instrumentation/Descriptor.h"
+
 #include <sys/types.h>
 
 #include <optional>
@@ -19,12 +21,21 @@ namespace Tools {
 void replaceFile(
     const std::string& path, std::string_view content, std::optional<::mode_t> mode = std::nullopt);
 
-// Does so for a file that this process renews again and again, and which every user can read. The
-// new file is PATH.new. REQUIRES: no other process does so with the same file.
-void renewFile(const std::string& path, std::string_view content);
+// A file that this process replaces again and again, and which every user can read. The new file is
+// PATH.new. A lock of PATH.lock, which remains, keeps other processes from renewing the same file;
+// a device or pipe has none.
+class RenewedFile {
+public:
+    // Removes the PATH.new of a process that was ended while it wrote. Throws std::runtime_error
+    // with the file and the reason where another process renews it, or where it cannot be renewed.
+    explicit RenewedFile(std::string path);
 
-// Removes the PATH.new of a process that was ended while it wrote. Throws std::runtime_error with
-// the file and the reason where renewFile() could not make another one.
-void prepareRenewal(const std::string& path);
+    // Throws std::runtime_error as replaceFile() does.
+    void renew(std::string_view content) const;
+
+private:
+    std::string path_;
+    Vorn::Descriptor lock_;
+};
 
 } // namespace Tools

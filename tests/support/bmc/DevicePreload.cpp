@@ -3,20 +3,18 @@
 // Preloaded into a reader of /dev/ipmi0, it connects the device to the system interface of ipmi_sim
 // at the loopback port SIMULATED_BMC. Each command takes SIMULATED_BMC_DELAY milliseconds more. As
 // the kernel does, it bridges commands to satellites by Send Message and Get Message (IPMI 2.0,
-// sections 22.6 and 22.7), and the device of a BMC that is gone opens and stays silent. While there
-// is a file SIMULATED_REMOVAL, the kernel has removed the device. Commands to satellites fail with
-// the error number SIMULATED_SATELLITE_ERROR. Where SIMULATED_LATE_ANSWERS is
-// set, one to the command before is received before each answer. A lock of the device is a name
-// that one process at a time can have. Where SIMULATED_CLOCK_JUMPS is set, the clock of the day
-// jumps back by an hour each time it is read.
+// sections 22.6 and 22.7). A device whose BMC has ended since it was opened answers each command at
+// once with the code of a timeout, also when the BMC has started again; none opens while there is
+// no BMC. While there is a file SIMULATED_REMOVAL, the kernel has removed the device. Commands to
+// satellites fail with the error number SIMULATED_SATELLITE_ERROR. Where SIMULATED_LATE_ANSWERS is
+// set, an answer to the command before is received before each answer. Where SIMULATED_CLOCK_JUMPS
+// is set, the clock of the day jumps back by an hour each time it is read.
 
 #include <arpa/inet.h>
 #include <linux/ipmi.h>
-#include <sys/eventfd.h>
 #include <sys/ioctl.h>
 #include <sys/socket.h>
 #include <sys/syscall.h>
-#include <sys/un.h>
 
 #include <dlfcn.h>
 #include <fcntl.h>
@@ -28,13 +26,11 @@
 #include <array>
 #include <cerrno>
 #include <cstdarg>
-#include <cstddef>
 #include <cstdint>
 #include <cstdlib>
 #include <cstring>
 #include <numeric>
 #include <optional>
-#include <string>
 #include <vector>
 
 namespace {
@@ -61,6 +57,7 @@ struct Device {
     int socket = -1;
     std::uint8_t sequence = 0;
     std::array<Request, 256> requests{}; // by their sequence numbers
+    Request last;                        // of the reader
 };
 
 Device device;
@@ -71,7 +68,7 @@ std::uint8_t checksum(const Bytes& bytes, std::size_t from)
         -std::accumulate(bytes.begin() + static_cast<std::ptrdiff_t>(from), bytes.end(), 0));
 }
 
-// Returns a socket; a descriptor that is never readable where the BMC is gone.
+// Returns what open() does.
 int connectedSocket()
 {
     sockaddr_in address{};
@@ -82,15 +79,15 @@ int connectedSocket()
     if (::connect(socket, reinterpret_cast<sockaddr*>(&address), sizeof address) == 0)
         return socket;
     ::close(socket);
-    return ::eventfd(0, EFD_CLOEXEC);
+    errno = ENODEV;
+    return -1;
 }
 
-// Connects the device to a BMC that has restarted.
-void reconnect()
+bool isConnected()
 {
-    const int socket = connectedSocket();
-    ::dup3(socket, device.socket, O_CLOEXEC);
-    ::close(socket);
+    std::uint8_t byte = 0;
+    const ssize_t count = ::recv(device.socket, &byte, 1, MSG_PEEK | MSG_DONTWAIT);
+    return count > 0 || (count < 0 && errno == EAGAIN);
 }
 
 void send(const Request& request, std::uint8_t lun, std::uint8_t netFunction, std::uint8_t command,
@@ -110,13 +107,7 @@ void send(const Request& request, std::uint8_t lun, std::uint8_t netFunction, st
         frame.push_back(isSpecial ? byte | 0x10U : byte);
     }
     frame.push_back(endOfMessage);
-    const auto write = [&] {
-        return ::send(device.socket, frame.data(), frame.size(), MSG_NOSIGNAL);
-    };
-    if (write() < 0) {
-        reconnect();
-        (void)write();
-    }
+    (void)::send(device.socket, frame.data(), frame.size(), MSG_NOSIGNAL);
 }
 
 std::optional<std::uint8_t> nextByte()
@@ -164,6 +155,7 @@ int submit(const ipmi_req& request)
         return -1;
     }
     Request sent{request.msgid, request.msg.netfn, request.msg.cmd};
+    device.last = sent;
     const Bytes data(request.msg.data, request.msg.data + request.msg.data_len);
     ipmi_addr address{};
     std::memcpy(&address, request.addr, std::min<std::size_t>(request.addr_len, sizeof address));
@@ -215,6 +207,9 @@ std::optional<Bytes> fetchBridged(const Request& request)
 
 std::optional<Answer> nextAnswer()
 {
+    constexpr std::uint8_t timedOut = 0xC3;
+    if (!isConnected())
+        return Answer{device.last, {timedOut}};
     const auto message = receive();
     if (!message)
         return std::nullopt;
@@ -245,7 +240,6 @@ int deliver(ipmi_recv& received)
     const auto late = lateAnswer();
     const auto answer = late ? late : nextAnswer();
     if (!answer) {
-        ::usleep(1000); // a closed socket is always readable
         errno = EAGAIN;
         return -1;
     }
@@ -260,26 +254,6 @@ int deliver(ipmi_recv& received)
     received.addr_len = std::min<unsigned>(received.addr_len, sizeof bmc);
     std::memcpy(received.addr, &bmc, received.addr_len);
     return 0;
-}
-
-// Binds a socket to a name, which this process has until its end.
-int lockDevice()
-{
-    static int lock = -1;
-    if (lock >= 0)
-        return 0;
-    sockaddr_un name{};
-    name.sun_family = AF_UNIX;
-    const std::string text = std::string("simulated-bmc-") + std::getenv("SIMULATED_BMC");
-    text.copy(name.sun_path + 1, text.size()); // an abstract name begins with NUL
-    const auto size = static_cast<socklen_t>(offsetof(sockaddr_un, sun_path) + 1 + text.size());
-    lock = ::socket(AF_UNIX, SOCK_DGRAM | SOCK_CLOEXEC, 0);
-    if (::bind(lock, reinterpret_cast<const sockaddr*>(&name), size) == 0)
-        return 0;
-    ::close(lock);
-    lock = -1;
-    errno = EWOULDBLOCK;
-    return -1;
 }
 
 template <typename Function>
@@ -359,14 +333,4 @@ EXPORTED int ioctl(int file, unsigned long request, ...) noexcept
     default:
         return 0;
     }
-}
-
-// <fcntl.h> has a type of the name, too, which the function would hide.
-EXPORTED int lockFile(int file, int operation) noexcept __asm__("flock");
-
-int lockFile(int file, int operation) noexcept
-{
-    if (file < 0 || file != device.socket)
-        return next<int (*)(int, int)>("flock")(file, operation);
-    return lockDevice();
 }

@@ -59,6 +59,21 @@ protected:
 
     std::string errors() const { return contentOf(folder_.path() / "err"); }
 
+    // Returns the name of the open device that the process has locked.
+    std::string lockedDevice() const
+    {
+        const std::filesystem::path process = "/proc/" + std::to_string(process_);
+        for (const auto& entry : std::filesystem::directory_iterator(process / "fd")) {
+            std::error_code closed; // meanwhile
+            const std::string target = std::filesystem::read_symlink(entry, closed).string();
+            if (target.starts_with("socket:") &&
+                contentOf(process / "fdinfo" / entry.path().filename()).find("FLOCK") !=
+                    std::string::npos)
+                return target;
+        }
+        return "";
+    }
+
     // Waits for a file that fulfils the condition. Each is read once.
     template <typename Condition>
     bool waitForFile(const Condition& holds) const

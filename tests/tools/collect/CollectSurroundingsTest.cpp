@@ -3,6 +3,7 @@
 // The process on a full disk, with a clock that jumps, and without rights.
 
 #include "tests/support/Requirement.h"
+#include "tests/support/Umask.h"
 #include "tests/tools/collect/CollectProcessTest.h"
 
 #include <sys/stat.h>
@@ -75,8 +76,9 @@ TEST_F(CollectSurroundingsTest, AFullDiskLeavesTheLastFileWhichAges)
     EXPECT_TRUE(waitUntil([&] { return renewed() > before; }));
     EXPECT_TRUE(waitUntil([&] { return errors() == problem + name + " is written again\n"; }))
         << errors();
-    EXPECT_TRUE(waitUntil(
-        [&] { return std::distance(std::filesystem::directory_iterator(seenDisk), {}) == 1; }));
+    EXPECT_TRUE(waitUntil([&] {
+        return std::distance(std::filesystem::directory_iterator(seenDisk), {}) == 2;
+    })) << "the file and its lock";
 }
 
 TEST_F(CollectSurroundingsTest, AClockThatJumpsChangesNothing)
@@ -96,8 +98,10 @@ TEST_F(CollectSurroundingsTest, EverybodyCanReadTheFile)
 {
     if (::geteuid() != 0)
         return cannotRun("only root can run a command as nobody");
-    ::umask(077);
-    collect();
+    {
+        const Testing::Umask umask(077);
+        collect();
+    }
     ::chmod(folder_.path().c_str(), 0755);
     const Ended ended =
         runCommand(joined(asNobody, {"list"}), {{"VORN_INSTRUMENTATION", "ipmi:" + file()}});
@@ -129,6 +133,15 @@ TEST_F(CollectSurroundingsTest, NobodyIsToldWhatIsNotPermitted)
     EXPECT_EQ(
         runCommand(once, bmc_.environment()).err, "sensorctl: " + file() + ": Permission denied\n");
 
+    // A folder takes the place of /run, where the file is by default.
+    std::filesystem::create_directory(folder_.path() / "run");
+    EXPECT_EQ(
+        runCommand(joined(inNamespace("/bin/mount --bind \"$0\" /run", folder_.path() / "run"),
+                       joined(asNobody, {"collect", "--once"})),
+            bmc_.environment())
+            .err,
+        "sensorctl: /run/sensor-profile: Permission denied\n");
+
     // A folder takes the place of /dev.
     std::filesystem::create_directory(folder_.path() / "dev");
     folder_.write("dev/ipmi0", "");
@@ -137,6 +150,22 @@ TEST_F(CollectSurroundingsTest, NobodyIsToldWhatIsNotPermitted)
         joined(inNamespace("/bin/mount --bind \"$0\" /dev", folder_.path() / "dev"), once));
     EXPECT_EQ(ended.code, 1);
     EXPECT_EQ(ended.err, "sensorctl: /dev/ipmi0: Permission denied\n");
+}
+
+TEST_F(CollectSurroundingsTest, ADeviceThatAnotherProcessHasLockedIsNotRead)
+{
+    if (::geteuid() != 0)
+        return cannotRun("only root can mount a folder");
+    std::filesystem::create_directory(folder_.path() / "dev");
+    folder_.write("dev/ipmi0", "");
+    const Words locked = {
+        "/usr/bin/flock", "--shared", "/dev/ipmi0", "/usr/bin/timeout", "10", sensorctl};
+    const Ended ended =
+        runCommand(joined(inNamespace("/bin/mount --bind \"$0\" /dev", folder_.path() / "dev"),
+            joined(locked, arguments({}))));
+    EXPECT_EQ(ended.code, 1);
+    EXPECT_EQ(ended.err, "sensorctl: another process reads the sensors of /dev/ipmi0 already\n");
+    EXPECT_FALSE(std::filesystem::exists(file() + ".lock"));
 }
 
 TEST_F(CollectSurroundingsTest, WithoutADeviceThereIsAnError)

@@ -4,6 +4,8 @@
 
 #include "tests/tools/collect/FakeController.h"
 
+#include <thread>
+
 namespace CollectorFailureTests {
 
 using Ipmi::Bytes;
@@ -102,17 +104,27 @@ TEST_F(CollectorFailureTest, ASilentControllerEndsThePass)
 {
     pass(controller_);
     controller_.commands.clear();
-    milliseconds waited{0};
+    std::vector<milliseconds> timeouts;
+    constexpr milliseconds delay{200};
     controller_.override = [&](const Command& command,
                                milliseconds timeout) -> std::optional<Bytes> {
         if (command.code == CommandCode::getSdrRepositoryInfo)
             return std::nullopt;
-        waited = timeout;
-        return Bytes{0xC3}; // as the kernel reports it, here at once
+        timeouts.push_back(timeout);
+        std::this_thread::sleep_for(delay);
+        return Bytes{0xC3}; // as the kernel reports it
     };
-    EXPECT_EQ(Testing::errorOf([this] { pass(controller_); }), "the BMC does not answer");
-    EXPECT_LE(waited, milliseconds(5000));
+    try {
+        pass(controller_);
+        ADD_FAILURE() << "the pass has not ended";
+    } catch (const Ipmi::SilentBmc& silence) {
+        EXPECT_STREQ(silence.what(), "the BMC does not answer");
+        EXPECT_FALSE(silence.hasWaited());
+    }
     EXPECT_EQ(controller_.commands.size(), 3U);
+    ASSERT_EQ(timeouts.size(), 2U);
+    EXPECT_LE(timeouts[0], milliseconds(5000));
+    EXPECT_LE(timeouts[1], milliseconds(5000) - delay); // together
     collector_.loseAll();
     for (const Vorn::MachineFileNode& node : collector_.nodes()) {
         EXPECT_EQ(node.values.status, 13U);
