@@ -44,8 +44,8 @@ public:
     static std::string ageOfCollection();
 
     // Returns the reasons why sources cannot be used, of which the provider publishes no sensors.
-    // Skips the chips where they are listed, since that is expensive. REQUIRES: selectMachine() was
-    // called.
+    // Skips the chips where they are listed, since that is expensive. Opens the others again, which
+    // may have changed since the provider read them. REQUIRES: selectMachine() was called.
     static std::vector<std::string> failures(bool areChipsListed);
 
     // Throws std::runtime_error when no library is given and none is found.

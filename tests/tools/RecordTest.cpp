@@ -1,5 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
+#include "tests/support/Umask.h"
 #include "tests/tools/ToolTest.h"
 
 #include <gmock/gmock.h>
@@ -52,9 +53,8 @@ TEST_F(RecordTest, RecordOfARecordIsTheSame)
 TEST_F(RecordTest, WritesAFileWithTheUsualPermissions)
 {
     const std::string file = (folder_.path() / "record.json").string();
-    const mode_t mask = ::umask(0027);
+    const Testing::Umask umask(0027);
     const Ended ended = run({"record", "--model", smallModel(), "-o", file});
-    ::umask(mask);
     EXPECT_EQ(ended.code, 0);
     EXPECT_EQ(ended.out, "");
     EXPECT_EQ(contentOf(file), run({"record", "--model", smallModel()}).out);

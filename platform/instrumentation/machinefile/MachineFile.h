@@ -9,7 +9,7 @@
 
 namespace Vorn {
 
-// Of a file that a process renews again and again. Times are seconds since the machine started,
+// Describes the renewal of a file by another process. Times are seconds since the machine started,
 // which also pass while it is suspended and do not jump when its clock is set.
 struct Renewal {
     double period = 0; // from one reading of the sensors to the next, in seconds
@@ -21,7 +21,7 @@ struct Renewal {
 // The content of a model file.
 struct MachineFile {
     std::vector<MachineFileNode> nodes;
-    std::optional<Renewal> renewal = {}; // of a file that a process renews
+    std::optional<Renewal> renewal = {}; // where another process renews the file
 };
 
 } // namespace Vorn

@@ -4,14 +4,13 @@
 // management controller, on a machine without settings.
 
 #include "tests/support/MountNamespace.h"
+#include "tests/support/Umask.h"
 #include "tests/support/bmc/SimulatedBmc.h"
 #include "tests/support/bmc/SimulatedSensor.h"
 #include "tests/tools/ChildProcess.h"
 
 #include <gmock/gmock.h>
 #include <nlohmann/json.hpp>
-
-#include <sys/stat.h>
 
 #include <algorithm>
 #include <filesystem>
@@ -39,7 +38,7 @@ protected:
         if (IsSkipped() || HasFailure())
             return;
         machine_.emplace();
-        ::umask(077);
+        const Testing::Umask umask(077);
         const Ended ended = Testing::run(
             {"collect", "--once"}, {.environment = machine_->controller.environment()});
         ASSERT_EQ(ended.code, 0) << ended.err;
