@@ -1,19 +1,14 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Messages for a user when there is nothing to show.
+// Whether a machine has no sensors, and what a user is told then.
 
 #pragma once
 
 #include "tools/Command.h"
-#include "tools/ObjectSearch.h"
 
 #include <cstddef>
 #include <optional>
 #include <string>
-
-namespace CLI {
-class App;
-}
 
 namespace Tools {
 
@@ -29,11 +24,5 @@ void checkMachineIsEmpty();
 
 // Writes to standard error that the machine, or the model file, has no sensors.
 ExitCode complainOfEmptyMachine(const std::optional<std::string>& model);
-
-// Writes to standard error why there is no object, with the command lines for sensors to choose
-// from. They begin with the words by which the tool was called, and repeat the options that the
-// command's parser was given. Calls checkMachineIsEmpty() where the machine has no sensors.
-ExitCode complainOfNoObject(
-    const ObjectFound& found, const CLI::App& parser, const std::optional<std::string>& model);
 
 } // namespace Tools

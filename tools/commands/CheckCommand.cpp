@@ -45,10 +45,10 @@ std::vector<Override> overridesIn(const std::vector<std::string>& texts)
 
 // Returns a sentence about the sensors that are left of those that were judged; an empty text where
 // there were none.
-std::string summaryOf(const Sensors& sensors, std::size_t judged)
+std::string summaryOfJudged(const Sensors& sensors, std::size_t judged)
 {
     if (!sensors.empty())
-        return Tools::summaryOf(sensors);
+        return summaryOf(sensors);
     return judged == 0 ? ""
                        : "no problem in " + std::to_string(judged) +
                              (judged == 1 ? " sensor." : " sensors.");
@@ -109,7 +109,7 @@ public:
         else
             for (const std::string& complaint : selected.complaints)
                 report.add(CheckStatus::unknown, complaint);
-        out.write(report.toText(summaryOf(selected.sensors, judged), isUtf8Locale()));
+        out.write(report.toText(summaryOfJudged(selected.sensors, judged), isUtf8Locale()));
         return static_cast<ExitCode>(report.status());
     }
 

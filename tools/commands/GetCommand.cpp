@@ -1,7 +1,7 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
 #include "host/broker/Instance.h"
-#include "tools/EmptyMachine.h"
+#include "tools/ObjectChoices.h"
 #include "tools/ObjectSearch.h"
 #include "tools/SourceOptions.h"
 #include "tools/UsageError.h"

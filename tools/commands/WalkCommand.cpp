@@ -3,6 +3,7 @@
 #include "host/broker/Instance.h"
 #include "host/broker/ObjectPath.h"
 #include "tools/EmptyMachine.h"
+#include "tools/ObjectChoices.h"
 #include "tools/ObjectSearch.h"
 #include "tools/SourceOptions.h"
 #include "tools/cim/AssociationGraph.h"

@@ -63,8 +63,8 @@ public:
         : Command(tool, "watch", "Show the sensors and their changes until a key ends it")
     {
         selection_.addTo(parser());
-        parser().add_flag("--problems", onlyProblems_,
-            "Begin with problems only; in a pipe: their changes");
+        parser().add_flag(
+            "--problems", onlyProblems_, "Begin with problems only; in a pipe: their changes");
         parser()
             .add_option("--interval", interval_, "Seconds between two readings (default: 2)")
             ->type_name("SECONDS")
