@@ -38,7 +38,8 @@ private:
 // unprintable characters escaped, and to the journal as an error. Ignores failures.
 void complain(std::string_view text, const std::vector<std::string>& lines = {}) noexcept;
 
-// Writes a text in the same way, to the journal as mere information.
+// Writes `sensorctl: <text>` to standard error, with unprintable characters escaped, and to the
+// journal as information. Ignores failures.
 void inform(std::string_view text) noexcept;
 
 } // namespace Tools

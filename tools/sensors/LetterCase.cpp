@@ -26,7 +26,7 @@ locale_t utf8Locale()
     return locale.get();
 }
 
-char32_t smallForeignLetter(char32_t character)
+char32_t lowerCaseBeyondAscii(char32_t character)
 {
     const locale_t locale = utf8Locale();
     return locale == nullptr ? character : static_cast<char32_t>(::towlower_l(character, locale));
@@ -34,23 +34,23 @@ char32_t smallForeignLetter(char32_t character)
 
 } // namespace
 
-char32_t smallLetter(char32_t character)
+char32_t lowerCase(char32_t character)
 {
     return character < endOfAscii
                ? static_cast<char32_t>(Host::foldCase(static_cast<char>(character)))
-               : smallForeignLetter(character);
+               : lowerCaseBeyondAscii(character);
 }
 
-std::string withSmallLetters(std::string_view text)
+std::string toLowerCase(std::string_view text)
 {
-    std::string small;
-    small.reserve(text.size());
+    std::string lower;
+    lower.reserve(text.size());
     while (!text.empty()) {
         const Text::Character character = Text::firstCharacter(text);
-        Text::appendUtf8(small, smallLetter(character.code));
+        Text::appendUtf8(lower, lowerCase(character.code));
         text.remove_prefix(character.size);
     }
-    return small;
+    return lower;
 }
 
 bool matchesPattern(const std::string& pattern, const std::string& text)

@@ -10,12 +10,11 @@
 
 namespace Tools {
 
-// Returns the small letter for a capital one, and other characters unchanged.
-char32_t smallLetter(char32_t character);
+// Returns the lower case of an upper-case letter, and other characters unchanged.
+char32_t lowerCase(char32_t character);
 
-// Returns the text with small letters in place of capital ones, and U+FFFD in place of invalid
-// bytes.
-std::string withSmallLetters(std::string_view text);
+// Returns the text in lower case, with U+FFFD in place of invalid bytes.
+std::string toLowerCase(std::string_view text);
 
 // Returns whether the text matches the pattern of fnmatch(3), in which ? stands for a character.
 bool matchesPattern(const std::string& pattern, const std::string& text);

@@ -26,12 +26,12 @@ std::string_view takeNumber(std::string_view& text)
     return digits;
 }
 
-// Removes the first character and returns it as a small letter.
+// Removes the first character and returns it in lower case.
 char32_t takeLetter(std::string_view& text)
 {
     const Text::Character character = Text::firstCharacter(text);
     text.remove_prefix(character.size);
-    return smallLetter(character.code);
+    return lowerCase(character.code);
 }
 
 } // namespace

@@ -75,11 +75,11 @@ std::string withPlainAddress(const std::string& chip)
     return chip.substr(0, dash + 1).append(digits.substr(zeros));
 }
 
-// REQUIRES: the selector has no capital letters.
+// REQUIRES: the selector is in lower case.
 bool isMatch(const std::string& selector, const std::string& name)
 {
-    const std::string small = withSmallLetters(name);
-    return small == selector || (isPattern(selector) && matchesPattern(selector, small));
+    const std::string lower = toLowerCase(name);
+    return lower == selector || (isPattern(selector) && matchesPattern(selector, lower));
 }
 
 // Returns the first chips, and how many others there are; an empty text when there are none.
@@ -99,13 +99,13 @@ std::string chipsOf(const Sensors& sensors)
 
 bool selects(const std::string& selector, const Sensor& sensor)
 {
-    const std::string small = withSmallLetters(selector);
+    const std::string lower = toLowerCase(selector);
     const std::array<std::string, 7> names = {sensor.chip, sensor.label, sensor.feature,
         sensor.path, sensor.deviceId, sensor.chip + "/" + sensor.label,
         sensor.chip + "/" + sensor.feature};
-    return isMatch(withPlainAddress(small), withPlainAddress(sensor.chip)) ||
+    return isMatch(withPlainAddress(lower), withPlainAddress(sensor.chip)) ||
            std::any_of(names.begin(), names.end(),
-               [&](const std::string& name) { return isMatch(small, name); });
+               [&](const std::string& name) { return isMatch(lower, name); });
 }
 
 bool isOfKind(const std::vector<std::string>& kinds, const Sensor& sensor)
@@ -121,10 +121,10 @@ bool SensorFilter::accepts(const Sensor& sensor) const
 std::string nothingMatches(const std::string& selector, const Sensors& sensors)
 {
     std::set<std::tuple<std::size_t, std::size_t, std::string>> nearest; // by distance and length
-    const std::string folded = withSmallLetters(selector);
+    const std::string lower = toLowerCase(selector);
     for (const Sensor& sensor : sensors)
         for (const std::string& name : {sensor.chip, sensor.label, sensor.path}) {
-            const std::size_t distance = distanceFrom(folded, withSmallLetters(name));
+            const std::size_t distance = distanceFrom(lower, toLowerCase(name));
             if (!selector.empty() && distance <= selector.size() / 3)
                 nearest.emplace(distance, name.size(), name);
             if (nearest.size() > suggestions)
