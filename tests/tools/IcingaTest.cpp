@@ -61,7 +61,8 @@ TEST_F(IcingaTest, UnderstandsStatusAndPerformanceData)
 {
     // An agent needs certificates, so that the host is checked without one.
     const std::string objects = replaced(example(), "command_endpoint = host.name\n",
-        "vars.sensors_problems = true\n  vars.sensors_selectors = [ \"cpu1\", \"+12V\" ]\n");
+        "vars.sensors_problems = true\n  vars.sensors_selectors = [ \"cpu0\", \"cpu1\", \"+12V\" "
+        "]\n");
     const Ended ended = icinga(objects, "",
         " >log & while kill -0 $! && ((SECONDS < 30)); do sleep 0.1; "
         "grep --no-filename . service.[0-9]* && break; done || cat log; kill -KILL -- -$!");
