@@ -58,14 +58,14 @@ bool SourceOptions::readsHwmon()
 
 std::string SourceOptions::ageOfCollection()
 {
-    try {
-        for (const Vorn::SourceEntry& entry : sources())
+    double oldest = -1;
+    for (const Vorn::SourceEntry& entry : sources())
+        try {
             if (entry.scheme == "ipmi")
-                if (const auto age = Vorn::IpmiSource(entry.argument).age(); age && *age >= 0)
-                    return "read " + std::to_string(std::lround(*age)) + " s ago";
-    } catch (const std::exception&) { // the library has reported the reason
-    }
-    return "";
+                oldest = std::max(oldest, Vorn::IpmiSource(entry.argument).age().value_or(-1));
+        } catch (const std::exception&) { // the library has reported the reason
+        }
+    return oldest < 0 ? "" : "read " + std::to_string(std::lround(oldest)) + " s ago";
 }
 
 std::vector<std::string> SourceOptions::failures(bool areChipsListed)

@@ -39,8 +39,9 @@ public:
     // Returns whether the sensors are those of the kernel. REQUIRES: selectMachine() was called.
     static bool readsHwmon();
 
-    // Returns when the sensors of a management controller were read, such as "read 4 s ago"; an
-    // empty text where the machine has none, or where they cannot be read.
+    // Returns when the sensors of a management controller were read, such as "read 4 s ago": the
+    // oldest of several collections, without those that cannot be read. Returns an empty text where
+    // there is none.
     static std::string ageOfCollection();
 
     // Returns the reasons why sources cannot be used, of which the provider publishes no sensors.

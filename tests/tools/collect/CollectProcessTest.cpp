@@ -4,6 +4,7 @@
 
 #include "tests/tools/collect/CollectProcessTest.h"
 
+#include "platform/instrumentation/machinefile/MachineFileWriter.h"
 #include "tests/support/ErrorOf.h"
 
 #include <sys/stat.h>
@@ -198,6 +199,23 @@ TEST_F(CollectProcessTest, ListShowsAGroupWithTheAgeOfTheReadings)
 {
     collect();
     EXPECT_THAT(listed("--color=never"), testing::ContainsRegex("ipmi +\\(read [0-9]+ s ago\\)\n"));
+}
+
+TEST_F(CollectProcessTest, ListShowsTheAgeOfTheOldestOfSeveralCollections)
+{
+    MachineFile older = collect();
+    older.nodes.resize(1);
+    older.nodes[0].path = "/ipmi/22/0/1";
+    older.renewal.value().time -= 20;
+    const std::string sources =
+        "ipmi:" + folder_.write("broken.json", "{") + ",ipmi:" + file() +
+        ",ipmi:" + folder_.write("older.json", Vorn::writeMachineFile(older));
+    const std::string table = Testing::run({"list", "--color=never"},
+        {.environment = {{"VORN_INSTRUMENTATION",
+             sources}}}).out;
+    EXPECT_THAT(table, testing::ContainsRegex("ipmi +\\(read 2[0-9] s ago\\)\n"));
+    EXPECT_THAT(table, testing::HasSubstr("CPU1 Temp:/ipmi/20/0/1"));
+    EXPECT_THAT(table, testing::HasSubstr("CPU1 Temp:/ipmi/22/0/1"));
 }
 
 } // namespace CollectProcessTests
