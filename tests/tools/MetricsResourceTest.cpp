@@ -35,7 +35,7 @@ TEST_F(MetricsResourceTest, TextThatClientsHaveYetToFetchIsBounded)
     const std::string large(std::size_t{25} << 20, 'x');
     Tools::MetricsResource metrics(harvests_, [&](Exposition& exposition) {
         exposition.begin({"large", "A large label."});
-        exposition.add(Tools::Labels().add("label", large), 1);
+        exposition.add(Tools::Labels().add("chip", "a"), "label", large, 1);
     });
     auto first = metrics.represent(head_);
     const auto second = metrics.represent(head_);
