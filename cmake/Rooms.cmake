@@ -17,12 +17,14 @@ function(sensor_profile_room name)
 endfunction()
 
 # sensor_profile_test(NAME [FILES_APART] [SINGLE_THREADED] SOURCES ... USES libraries ...
-#                     [ENVIRONMENT variables ...])
+#                     [ENVIRONMENT variables ...] [SHARDS number])
 # Adds one GoogleTest executable and registers it with CTest. The test framework's headers, which take
 # most of the time of each test file, are compiled once and shared. The thread sanitizer has nothing
-# to find in SINGLE_THREADED tests, so that it does without them.
+# to find in SINGLE_THREADED tests, so that it does without them. With SHARDS, CTest runs so many
+# parts of the tests side by side.
 function(sensor_profile_test name)
-  cmake_parse_arguments(test "FILES_APART;SINGLE_THREADED" "" "SOURCES;USES;ENVIRONMENT" ${ARGN})
+  cmake_parse_arguments(
+    test "FILES_APART;SINGLE_THREADED" "SHARDS" "SOURCES;USES;ENVIRONMENT" ${ARGN})
   sensor_profile_test_executable(${name} ${test_SOURCES})
   target_precompile_headers(${name} REUSE_FROM test_headers)
   target_link_libraries(${name} PRIVATE ${test_USES} support_log)
@@ -33,14 +35,25 @@ function(sensor_profile_test name)
     set_target_properties(${name} PROPERTIES EXCLUDE_FROM_ALL TRUE)
     return()
   endif()
-  add_test(NAME ${name} COMMAND ${name})
   # The settings of the environment must not reach the tests.
-  set(environment VORN_INSTRUMENTATION= RYNLOG_LOG=off RYNLOG_TRACE=off LC_ALL=C.UTF-8)
-  set_tests_properties(${name} PROPERTIES
-    ENVIRONMENT "${environment};${test_ENVIRONMENT}"
-    # The end of the output where cases were skipped and none failed.
-    SKIP_REGULAR_EXPRESSION "  SKIPPED [^\n]*\n$"
-    TIMEOUT 300)
+  set(environment VORN_INSTRUMENTATION= RYNLOG_LOG=off RYNLOG_TRACE=off LC_ALL=C.UTF-8
+    ${test_ENVIRONMENT})
+  if(NOT test_SHARDS)
+    set(test_SHARDS 1)
+  endif()
+  math(EXPR last "${test_SHARDS} - 1")
+  foreach(index RANGE ${last})
+    set(part ${name})
+    if(index GREATER 0)
+      set(part ${name}_shard_${index})
+    endif()
+    add_test(NAME ${part} COMMAND ${name})
+    set_tests_properties(${part} PROPERTIES
+      ENVIRONMENT "${environment};GTEST_TOTAL_SHARDS=${test_SHARDS};GTEST_SHARD_INDEX=${index}"
+      # The end of the output where cases were skipped and none failed.
+      SKIP_REGULAR_EXPRESSION "  SKIPPED [^\n]*\n$"
+      TIMEOUT 300)
+  endforeach()
 endfunction()
 
 # Adds an executable with the options of all tests, which their precompiled headers need, too.
