@@ -2,20 +2,35 @@
 
 // Sensors by what users type into the search.
 
-/** Returns text without letter case, which no comparison regards. */
-const folded = (text) => text.toLowerCase();
+/**
+ * Returns text without letter case, which no comparison regards. Like the terminal, it has no other
+ * letter for a capital sigma at the end of a word.
+ */
+const folded = (text) => text.replaceAll('Σ', 'σ').toLowerCase();
+
+const address = new RegExp('(-(?:i2c|isa|pci|spi|virtual|acpi|hid|mdio|scsi)(?:-[0-9*?]*)?-)' +
+    '(?:0[xX])?0*([0-9a-fA-F]+)$');
+
+/**
+ * Returns the name of a chip with its address as libsensors compares it, without leading zeros. A
+ * name that does not end with a bus of libsensors and an address stays as it is.
+ */
+const withPlainAddress = (chip) => chip.replace(address, '$1$2');
 
 /**
  * Returns the names by which `sensorctl` selects the sensor, in lower case. The first is that of
- * the chip.
+ * the chip with its plain address.
  */
 export function namesOf({ chip, label, deviceId }) {
     const name = label ?? '';
-    const path = deviceId.startsWith(`${name}:`) ? deviceId.slice(name.length + 1) : deviceId;
+    // The identifier has the description, of which the label lacks the blanks at the end.
+    const afterLabel = deviceId.startsWith(name) ? deviceId.slice(name.length) : '';
+    const isNamed = /^[ \t]*:/.test(afterLabel);
+    const path = isNamed ? afterLabel.slice(afterLabel.indexOf(':') + 1) : deviceId;
     const rest = path.replace(/^(\/hwmon)?\//, '');
     const feature = rest.startsWith(`${chip}/`) ? rest.slice(chip.length + 1) : rest;
-    return [chip, name, feature, path, deviceId, `${chip}/${name}`, `${chip}/${feature}`]
-        .map(folded);
+    return [withPlainAddress(chip), chip, name, feature, path, deviceId, `${chip}/${name}`,
+        `${chip}/${feature}`].map(folded);
 }
 
 /** The character classes of POSIX, for characters in lower case. */
@@ -101,16 +116,18 @@ export function matcherOf(pattern) {
     };
 }
 
-/** Returns the name of a chip with its address as libsensors compares it: without leading zeros. */
-const withPlainAddress = (chip) => chip.replace(/-(?:0x)?0*([0-9a-f]+)$/, '-$1');
+/** Returns a function that says whether a name in lower case is the selector or matches it. */
+function testOf(selector) {
+    const matches = /[*?[]/.test(selector) ? matcherOf(selector) : () => false;
+    return (name) => name === selector || matches(name);
+}
 
 /** Returns a function that says whether `sensorctl` selects a sensor with these names. */
 export function selectorOf(text) {
     const selector = folded(text);
-    const isPattern = /[*?[]/.test(selector);
-    const matches = isPattern ? matcherOf(selector) : (name) => name === selector;
-    return (names) => names.some(matches) ||
-        withPlainAddress(names[0]) === withPlainAddress(selector);
+    const isName = testOf(selector);
+    const isPlainChip = testOf(withPlainAddress(selector));
+    return ([plainChip, ...names]) => isPlainChip(plainChip) || names.some(isName);
 }
 
 /** Returns the words of a text: what blanks separate, and what quotation marks hold together. */

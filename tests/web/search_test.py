@@ -10,6 +10,7 @@ import subprocess
 from selenium.webdriver.common.keys import Keys
 
 from browser import PageTest
+from machine import Machine
 from served import SENSORCTL, demonstration
 
 VISIBLE = ("[...document.querySelectorAll('.chips .sensor:not([hidden])')]"
@@ -21,7 +22,15 @@ class SearchTest(PageTest):
         super().setUp()
         self.server = demonstration()
 
+    def selected_at_the_terminal(self, server, selector):
+        """Returns the labels of the sensors that `sensorctl` selects."""
+        listed = subprocess.run(
+            [SENSORCTL, "list", "--json", "--model", server.model, selector],
+            capture_output=True, check=False).stdout
+        return {sensor["label"] for sensor in json.loads(listed or "[]")}
+
     def selected(self, selector):
+        """Returns the labels of the sensors that the page selects."""
         return self.driver.execute_async_script(
             "const [selector, done] = arguments;"
             "const rows = [...document.querySelectorAll('.chips .sensor')];"
@@ -54,10 +63,7 @@ class SearchTest(PageTest):
         for selector in ("system/psu1", "PSU 1 FAN", "[pn]su[[:digit:]]", "*fan[!1-3]", "vbat", "*",
                          "CPU 1 Package Temp:/system/cpu1/package", "/system/cpu?/*"):
             with self.subTest(selector):
-                listed = subprocess.run(
-                    [SENSORCTL, "list", "--json", "--model", self.server.model, selector],
-                    capture_output=True, check=False).stdout
-                self.assertEqual({sensor["label"] for sensor in json.loads(listed)},
+                self.assertEqual(self.selected_at_the_terminal(self.server, selector),
                                  set(self.selected(selector)))
         self.search("nowhere")
         self.assertEqual("Shown: 0", self.run_script("document.querySelector('#found').innerText"))
@@ -67,6 +73,28 @@ class SearchTest(PageTest):
             "[...document.querySelectorAll('.chip:not([hidden]) .chip-title')]"
             ".map(title => title.textContent)"))
         self.assertFalse(self.driver.find_element("class name", "none").is_displayed())
+
+    def test_selects_by_addresses_blanks_and_exact_names_as_the_terminal_does(self):
+        server = self.serve(Machine([
+            {"type": "voltage", "path": path, "description": label, "status": 1, "reading": 1}
+            for path, label in (
+                ("/hwmon/nct6775-isa-0290/in0", "Vcore"), ("/hwmon/jc42-i2c-1-001a/in0", "Bus"),
+                ("/hwmon/w-ISA-0290/in0", "Capital"), ("/rack/board-0a/t", "Board"),
+                ("/rack/x/temp2", "Blank "), ("/rack/x/temp3", "A[1]"), ("/rack/x/temp4", "A1"),
+                ("/rack/x/temp5", "ΟΔΟΣ"))]))
+        self.open(server)
+        for selector, labels in {
+                "nct6775-isa-290": {"Vcore"}, "nct6775-isa-0x0290": {"Vcore"},
+                "*-isa-290": {"Vcore"}, "nct6775-*-290": {"Vcore"},
+                "nct6775-*-00290": set(), "jc42-i2c-*-1A": {"Bus"}, "jc42-i2c-1-1a": {"Bus"},
+                "w-isa-290": set(), "w-isa-0290": {"Capital"},
+                "rack/board-a": set(), "rack/board-0a": {"Board"}, "temp2": {"Blank"},
+                "/rack/x/temp2": {"Blank"}, "rack/x/temp2": {"Blank"}, "blank": {"Blank"},
+                "Blank :/rack/x/temp2": {"Blank"}, "a[1]": {"A1", "A[1]"}, "οδοσ": {"ΟΔΟΣ"},
+                "οδος": set()}.items():
+            with self.subTest(selector):
+                self.assertEqual(labels, self.selected_at_the_terminal(server, selector))
+                self.assertEqual(labels, set(self.selected(selector)))
 
     def test_keeps_in_the_address_what_is_shown(self):
         self.open(self.server)
