@@ -37,7 +37,7 @@ private:
 class WebFiles {
 public:
     // Reads all files of the folder and the folders in it, each with its compressed form (`.gz`)
-    // beside it. Throws std::runtime_error with the file and the reason.
+    // where that is beside it. Throws std::runtime_error with the file and the reason.
     explicit WebFiles(const std::filesystem::path& folder);
 
     // Adds those that are served, as /web/ and their names. They belong to this object.
