@@ -2,11 +2,16 @@
 
 // The history of the sensors in the chart.
 
+/** Returns whether the server keeps a history. A request for one that is off would fail. */
+export const isHistoryKept = () => document.documentElement.dataset.history !== 'off';
+
 /**
  * Returns the answer of `/api/history` for these devices; null where there is no history of them.
  * Throws where the server does not answer.
  */
 export async function loadHistory(devices, span) {
+    if (!isHistoryKept())
+        return null;
     const query = new URLSearchParams({ span });
     for (const device of devices)
         query.append('device', device);

@@ -15,7 +15,6 @@ const silenceLimit = 40_000; // the server sends something every 15 seconds
 export class EventStream {
     #source = null;
     #timer = 0;
-    #isLive = false;
     #lastContact = null;
 
     constructor(handler, onState) {
@@ -27,17 +26,13 @@ export class EventStream {
 
     #begin(state) {
         this.#end();
+        this.onState(state, this.#lastContact);
         if (document.visibilityState === 'hidden')
             return;
-        this.onState(state, this.#lastContact);
         this.#source = new EventSource('/api/events');
-        for (const name of ['sensors', 'changes', 'alive'])
+        for (const name of ['sensors', 'sources', 'changes', 'alive'])
             this.#source.addEventListener(name, (event) => this.#receive(name, event));
-        this.#source.addEventListener('error', () => {
-            if (this.#isLive)
-                this.#lastContact = Date.now();
-            this.#lose();
-        });
+        this.#source.addEventListener('error', () => this.#lose());
         this.#setTimer(() => this.#lose(), silenceLimit);
     }
 
@@ -45,12 +40,10 @@ export class EventStream {
         clearTimeout(this.#timer);
         this.#source?.close();
         this.#source = null;
-        this.#isLive = false;
     }
 
     #receive(name, event) {
         this.#setTimer(() => this.#lose(), silenceLimit);
-        this.#isLive = true;
         this.#lastContact = Date.now();
         this.onState('live', this.#lastContact);
         this.handler(name, JSON.parse(event.data));

@@ -2,10 +2,13 @@
 
 // The last hour of all sensors, a reading a minute.
 
+import { isHistoryKept } from './ChartData.js';
+
 const points = 60;
 const secondsOfPoint = 60;
 
 export class HourHistory {
+    isLive = false; // whether the readings of the machine are those of now
     #values = new Map(); // by deviceId, at most `points` of them
     #timer = 0;
     #isMissing = false;
@@ -17,11 +20,14 @@ export class HourHistory {
     /**
      * Reads the history, which the readings of the machine continue until the next call. Sets also
      * since when the sensors are in their states. Where the server keeps no history, the readings
-     * are collected from now on; where it does not answer, it is asked again after a minute.
+     * are collected from now on; where it does not answer, it is asked again after a minute. While
+     * the machine is not live, there are no readings.
      */
     async load() {
         clearInterval(this.#timer);
         this.#timer = setInterval(() => this.#continue(), 1000 * secondsOfPoint);
+        if (!isHistoryKept())
+            return;
         const response = await fetch(`/api/history?span=hour&points=${points}`).catch(() => null);
         this.#isMissing = response?.status !== 404;
         if (!response?.ok)
@@ -38,8 +44,11 @@ export class HourHistory {
 
     /** Returns the readings of the last hour and the present one, the oldest first. */
     valuesOf(deviceId) {
-        const present = this.machine.sensors.get(deviceId)?.value ?? null;
-        return [...(this.#values.get(deviceId) ?? []), present];
+        return [...(this.#values.get(deviceId) ?? []), this.#present(deviceId)];
+    }
+
+    #present(deviceId) {
+        return this.isLive ? this.machine.sensors.get(deviceId)?.value ?? null : null;
     }
 
     #continue() {
@@ -47,7 +56,7 @@ export class HourHistory {
             this.load();
             return;
         }
-        this.#values = new Map([...this.machine.sensors.values()].map(({ deviceId, value }) =>
-            [deviceId, [...(this.#values.get(deviceId) ?? []), value].slice(-points)]));
+        this.#values = new Map([...this.machine.sensors.keys()].map((deviceId) =>
+            [deviceId, this.valuesOf(deviceId).slice(-points)]));
     }
 }

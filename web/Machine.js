@@ -6,7 +6,7 @@ import { namesOf } from './Selectors.js';
 import { isProblem, urgencyOf } from './States.js';
 
 const order = new Intl.Collator('en', { numeric: true, sensitivity: 'base' });
-const secondsUntilForgotten = 3600;
+const secondsUntilForgotten = 24 * 3600; // as long as the server has its history
 
 /** Compares sensors by chip, label and identifier, so that "temp2" comes before "temp10". */
 export function compareSensors(first, second) {
@@ -22,7 +22,7 @@ export function compareSensors(first, second) {
  * - `isGone`: the machine does not have the sensor any more;
  * - `since`: the time of Unix at which its state began, null while that is unknown;
  * - `isSinceEarlier`: the state began at an unknown time before `since`.
- * A sensor that is gone for an hour is forgotten.
+ * A sensor that is gone for a day is forgotten.
  *
  * Dispatches `change`, whose `detail` has the sensors that were added or have changed, what they
  * were before, and the identifiers of those that are forgotten.

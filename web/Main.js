@@ -10,7 +10,7 @@ import { HourHistory } from './HourHistory.js';
 import { Machine } from './Machine.js';
 import { Overview } from './Overview.js';
 import { Sparklines } from './Sparkline.js';
-import { loadTexts, nowText, setText, text, timeText } from './Texts.js';
+import { isolated, loadTexts, nowText, setText, text, timeText } from './Texts.js';
 
 const texts = loadTexts();
 const address = new Address();
@@ -34,7 +34,14 @@ function showChart() {
         overview.returnFocus(last);
 }
 
+/** Names the sources that cannot be read: their sensors may be gone, or have never been there. */
+function showLostSources(names) {
+    setText(document.getElementById('lost-sources'), names.length === 0 ? ''
+        : text('lostSources', { names: names.map(isolated).join(', ') }));
+}
+
 function showConnection(state, lastContact) {
+    hourHistory.isLive = state === 'live';
     const time = lastContact && timeText(lastContact / 1000);
     const words = { live: () => text('live'), lost: () => text('connectionLost', { time }),
         connecting: () => time ? text('connecting', { time }) : '' };
@@ -58,10 +65,12 @@ function showOverview() {
 }
 
 function receive(name, data) {
-    if (name !== 'sensors')
+    if (name === 'changes' || name === 'alive')
         machine.setTime(data.time);
     if (name === 'changes')
         machine.apply(data);
+    if (name === 'sources')
+        showLostSources(data.lost);
     if (name !== 'sensors')
         return;
     machine.replace(data);

@@ -30,12 +30,13 @@ struct Event {
 
 class ChangeFeedTest : public testing::Test {
 protected:
-    void publish(const std::vector<Sensor>& sensors)
+    void publish(
+        const std::vector<Sensor>& sensors, const std::vector<std::string>& lostSources = {})
     {
         std::vector<const Sensor*> pointers;
         for (const Sensor& each : sensors)
             pointers.push_back(&each);
-        feed.publish(pointers, 1000);
+        feed.publish(pointers, lostSources, 1000);
     }
 
     static Event next(Host::Http::Stream& stream)
@@ -62,6 +63,7 @@ TEST_F(ChangeFeedTest, BeginsWithTheListAndContinuesWithChanges)
     EXPECT_EQ(list.name, "sensors");
     ASSERT_EQ(list.data.size(), 2U);
     EXPECT_EQ(list.data[0]["label"], "a");
+    EXPECT_EQ(next(*stream).data, json({{"lost", json::array()}}));
     const Event changes = next(*stream);
     EXPECT_EQ(changes.name, "changes");
     EXPECT_EQ(changes.data["time"], 1000);
@@ -78,8 +80,26 @@ TEST_F(ChangeFeedTest, NewStreamGetsAListThatIsNewAtOnce)
     publish({sensorOf("a", 2)});
     const auto second = feed.subscribe();
     EXPECT_EQ(next(*second).data[0]["value"], 2);
+    EXPECT_EQ(next(*second).name, "sources");
     publish({sensorOf("a", 3)});
     EXPECT_EQ(next(*second).data["sensors"][0]["value"], 3);
+}
+
+TEST_F(ChangeFeedTest, LostSourcesAreSentWhenTheyChange)
+{
+    const auto stream = feed.subscribe();
+    const json lost = {{"lost", {"hwmon", "model:/a"}}};
+    for (int i = 0; i < 2; ++i)
+        publish({}, {"hwmon", "model:/a"});
+    const auto second = feed.subscribe();
+    publish({});
+    for (Host::Http::Stream* const each : {stream.get(), second.get()}) {
+        EXPECT_EQ(next(*each).name, "sensors");
+        const Event sources = next(*each);
+        EXPECT_EQ(sources.name, "sources");
+        EXPECT_EQ(sources.data, lost);
+        EXPECT_EQ(next(*each).data, json({{"lost", json::array()}}));
+    }
 }
 
 TEST_F(ChangeFeedTest, NewStreamEndsTheWaitOfWhoPublishes)
@@ -96,9 +116,12 @@ TEST_F(ChangeFeedTest, EventsAreSharedByAllStreams)
     const auto first = feed.subscribe();
     const auto second = feed.subscribe();
     publish({sensorOf("a", 1)});
-    EXPECT_EQ(first->next(), second->next());
     publish({sensorOf("a", 2)});
-    EXPECT_EQ(first->next(), second->next());
+    for (const char* const name : {"sensors", "sources", "changes"}) {
+        const auto event = first->next();
+        EXPECT_EQ(event, second->next());
+        EXPECT_TRUE(event->starts_with(std::string("event: ") + name + "\n"));
+    }
 }
 
 TEST_F(ChangeFeedTest, StreamThatIsNotReadEnds)
@@ -114,12 +137,13 @@ TEST_F(ChangeFeedTest, HeartbeatsFollowWhileTheSensorsAreRead)
 {
     ChangeFeed quick(std::chrono::milliseconds(200));
     const auto stream = quick.subscribe();
-    quick.publish({}, 1000);
+    quick.publish({}, {}, 1000);
     EXPECT_EQ(next(*stream).name, "sensors");
+    EXPECT_EQ(next(*stream).name, "sources");
     std::jthread publisher([&] {
         for (int i = 0; i < 6; ++i) {
             std::this_thread::sleep_for(std::chrono::milliseconds(50));
-            quick.publish({}, 1000);
+            quick.publish({}, {}, 1000);
         }
     });
     const Event heartbeat = next(*stream);

@@ -219,6 +219,23 @@ TEST_F(PageTest, ChangeIsSentWithinThreeSeconds)
     EXPECT_EQ(changes["sensors"][0]["state"], "Critical low");
 }
 
+TEST_F(PageTest, SourceThatCannotBeReadIsNamed)
+{
+    const std::string file = smallModel();
+    const ServerProcess server({"--model", file});
+    const std::string name = "model:" + file;
+    folder_.write("model.json", "{broken");
+    EXPECT_THAT(read(server, "/").body,
+        HasSubstr("Not all sensors of \u2068" + name + "\u2069 can be read."));
+    EXPECT_THAT(read(server, "/", "Accept-Language: de\r\n").body,
+        HasSubstr("Nicht alle Sensoren von \u2068" + name + "\u2069 "));
+    Events events(server.port());
+    EXPECT_EQ(events.next("sources")["lost"], json::array({name}));
+    smallModel();
+    EXPECT_EQ(events.next("sources")["lost"], json::array());
+    EXPECT_THAT(read(server, "/").body, Not(HasSubstr("Not all sensors")));
+}
+
 #ifdef SENSOR_PROFILE_MEMORY_IS_EXACT // sanitizers need much more
 TEST_F(PageTest, HundredOpenPagesTakeLessThanTwentyMegabytes)
 {
@@ -324,6 +341,14 @@ TEST_F(PageTest, FolderOfTheHistoryMustExist)
     EXPECT_EQ(ended.code, 2);
     EXPECT_THAT(
         ended.err, HasSubstr("--history needs a folder or off: there is no folder /proc/none"));
+}
+
+TEST_F(PageTest, FolderOfTheHistoryThatCannotBeLookedUpIsAMistakeInTheCommandLine)
+{
+    const std::string tooLong(300, 'x');
+    const Ended ended = failing(withModel({"--history", "/" + tooLong, "--check"}));
+    EXPECT_EQ(ended.code, 2);
+    EXPECT_THAT(ended.err, HasSubstr("--history needs a folder or off: there is no folder /xxx"));
 }
 
 TEST_F(PageTest, FolderOfTheHistoryIsThatOfOneServer)

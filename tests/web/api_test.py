@@ -91,15 +91,16 @@ class ApiTest(unittest.TestCase):
     def test_knows_no_history_of_an_unknown_device(self):
         self.assertEqual(404, self.ask("/api/history", ("span", "hour"), ("device", "none"))[0])
 
-    def test_sends_the_list_and_then_changes(self):
+    def test_sends_the_list_the_lost_sources_and_then_changes(self):
         machine = Machine.demonstration()
         server = Server(machine).start()
         self.addCleanup(server.stop)
         schemas = {"sensors": {"$ref": "#/components/schemas/List"},
+                   "sources": {"$ref": "#/components/schemas/Sources"},
                    "changes": {"$ref": "#/components/schemas/Changes"}}
         with urllib.request.urlopen(server.address + "api/events", timeout=10) as answer:
             self.assertEqual("text/event-stream", answer.headers.get_content_type())
-            for expected in ("sensors", "changes"):
+            for expected in schemas:
                 lines = []
                 while (line := answer.readline().decode().strip()) or not lines:
                     lines.append(line)

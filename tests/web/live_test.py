@@ -111,6 +111,69 @@ class LiveTest(PageTest):
                 self.assertEqual(is_earlier, result["isSinceEarlier"])
                 self.assertEqual(970 if states else 1000, result["since"])
 
+    def test_names_a_source_that_cannot_be_read(self):
+        words = "document.querySelector('#lost-sources').textContent"
+        sentence = f"Not all sensors of \u2068model:{self.server.model}\u2069 can be read."
+        self.assertEqual("", self.run_script(words))
+        self.server.model.write_text("{broken")
+        self.wait_for(f"{words} === arguments[0]", 10, sentence)
+        self.driver.refresh()
+        self.wait_for("!document.querySelector('#overview').hidden")
+        self.assertEqual(sentence, self.run_script(words))
+        self.machine.on_change()
+        self.wait_for(f"{words} === ''")
+
+    def test_remembers_for_a_day_what_is_gone(self):
+        counts = self.driver.execute_async_script(
+            "const done = arguments[0];"
+            "import('/web/Machine.js').then(({Machine}) => {"
+            "    const machine = new Machine();"
+            "    machine.setTime(1000000);"
+            "    machine.replace([{deviceId: 'a:/b/a', chip: 'b', label: 'a', state: 'Lost'}]);"
+            "    machine.apply({time: 1000000, sensors: [], gone: ['a:/b/a']});"
+            "    done([23, 25].map((hours) => {"
+            "        machine.setTime(1000000 + 3600 * hours);"
+            "        return machine.troubles().length;"
+            "    }));"
+            "});")
+        self.assertEqual([1, 0], counts)
+
+    def test_has_no_readings_of_the_time_without_a_connection(self):
+        values = self.driver.execute_async_script(
+            "const done = arguments[0];"
+            "let tick;"
+            "window.setInterval = (callback) => { tick = callback; };"
+            "window.fetch = async () => new Response(JSON.stringify({interval: 60, end: 1000,"
+            "    sensors: [{deviceId: 'a', values: [1, 2], states: []}]}));"
+            "import('/web/HourHistory.js').then(async ({HourHistory}) => {"
+            "    const sensors = new Map([['a', {deviceId: 'a', value: 42}]]);"
+            "    const history = new HourHistory({sensors, setSince() {}});"
+            "    await history.load();"
+            "    for (history.isLive of [true, false])"
+            "        tick();"
+            "    done(history.valuesOf('a'));"
+            "});")
+        self.assertEqual([1, 2, 42, None, None], values)
+
+    def test_tells_the_last_event_as_the_begin_of_a_lost_connection(self):
+        states = self.driver.execute_async_script(
+            "const done = arguments[0];"
+            "let source;"
+            "window.EventSource = class extends EventTarget {"
+            "    constructor() { super(); source = this; }"
+            "    close() {}"
+            "};"
+            "import('/web/EventStream.js').then(({EventStream}) => {"
+            "    const states = [];"
+            "    new EventStream(() => {}, (...state) => states.push(state));"
+            "    Date.now = () => 1000;"
+            "    source.dispatchEvent(new MessageEvent('alive', {data: '{}'}));"
+            "    Date.now = () => 31000;"
+            "    source.dispatchEvent(new Event('error'));"
+            "    done(states);"
+            "});")
+        self.assertEqual([["connecting", None], ["live", 1000], ["lost", 1000]], states)
+
     def test_survives_a_restart_of_the_server(self):
         self.expected_errors = ("ERR_CONNECTION_REFUSED", "ERR_INCOMPLETE_CHUNKED_ENCODING",
                                 "ERR_CONNECTION_RESET", "ERR_EMPTY_RESPONSE")

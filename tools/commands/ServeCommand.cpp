@@ -184,7 +184,8 @@ public:
             requireReadable(file);
 
         const std::string text = greeting(sockets, protection.passwords() != nullptr);
-        PageService page(harvests, options_.history, installedFolder() / "web");
+        PageService page(
+            harvests, options_.isHistoryKept, options_.history, installedFolder() / "web");
         Host::Http::Resources resources{{"/metrics", metrics}};
         page.addTo(resources);
         Host::Http::Server server(operations, std::move(sockets), options_.http,

@@ -24,6 +24,16 @@ std::shared_ptr<const std::string> eventOf(std::string_view name, std::string_vi
     return event;
 }
 
+std::shared_ptr<const std::string> sourcesEvent(const std::vector<std::string>& lost)
+{
+    std::string names;
+    for (const std::string& name : lost) {
+        names += names.empty() ? "" : ", ";
+        appendString(names, name);
+    }
+    return eventOf("sources", "{\"lost\": [" + names + "]}");
+}
+
 std::shared_ptr<const std::string> heartbeat()
 {
     return eventOf("alive", "{\"time\": " + std::to_string(std::time(nullptr)) + "}");
@@ -89,7 +99,7 @@ std::unique_ptr<Host::Http::Stream> ChangeFeed::subscribe()
     auto subscription = std::make_unique<Subscription>(*this);
     const std::lock_guard lock(mutex_);
     if (isPublishedWithin(period))
-        subscription->add(listEvent());
+        begin(*subscription);
     else
         isAwaited_ = true;
     hasBegun_ = true;
@@ -117,7 +127,8 @@ bool ChangeFeed::waitUntil(Clock::time_point time, const std::stop_token& stop)
     return std::exchange(isAwaited_, false);
 }
 
-void ChangeFeed::publish(const std::vector<const Sensor*>& sensors, std::time_t time)
+void ChangeFeed::publish(const std::vector<const Sensor*>& sensors,
+    std::vector<std::string> lostSources, std::time_t time)
 {
     std::vector<Known> now;
     now.reserve(sensors.size());
@@ -130,14 +141,30 @@ void ChangeFeed::publish(const std::vector<const Sensor*>& sensors, std::time_t 
     const Event changes = changesSince(now, time);
     if (changes)
         list_ = nullptr;
+    const bool areOthersLost = !sources_ || lostSources != lostSources_;
+    if (areOthersLost) {
+        lostSources_ = std::move(lostSources);
+        sources_ = sourcesEvent(lostSources_);
+    }
     published_ = Clock::now();
     isAwaited_ = false;
-    for (Subscription* const each : subscriptions_)
-        if (each->isNew())
-            each->add(listEvent());
-        else if (changes)
+    for (Subscription* const each : subscriptions_) {
+        if (each->isNew()) {
+            begin(*each);
+            continue;
+        }
+        if (changes)
             each->add(changes);
+        if (areOthersLost)
+            each->add(sources_);
+    }
     changed_.notify_all();
+}
+
+void ChangeFeed::begin(Subscription& subscription)
+{
+    subscription.add(listEvent());
+    subscription.add(sources_);
 }
 
 ChangeFeed::Event ChangeFeed::listEvent()

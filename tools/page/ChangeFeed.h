@@ -19,7 +19,7 @@
 
 namespace Tools {
 
-// Publishes the sensors and their changes as server-sent events
+// Publishes the sensors, the sources that are lost, and their changes as server-sent events
 // (https://html.spec.whatwg.org/multipage/server-sent-events.html). Thread-safe.
 class ChangeFeed {
 public:
@@ -35,9 +35,9 @@ public:
     {
     }
 
-    // Creates a stream whose first event is the list of the sensors. It ends where the client
-    // fetches it too slowly, and where nothing was published between two heartbeats. The feed must
-    // outlive it.
+    // Creates a stream that begins with the list of the sensors and the lost sources. It ends where
+    // the client fetches it too slowly, and where nothing was published between two heartbeats. The
+    // feed must outlive it.
     std::unique_ptr<Host::Http::Stream> subscribe();
     bool hasSubscribers() const;
 
@@ -45,9 +45,10 @@ public:
     // whether the sensors have to be published for a new stream.
     bool waitUntil(Clock::time_point time, const std::stop_token& stop);
 
-    // Sends what has changed since the last call, and the list to new streams. The sensors are in
-    // the order of a list.
-    void publish(const std::vector<const Sensor*>& sensors, std::time_t time);
+    // Sends what has changed since the last call, and all to new streams. The sensors are in the
+    // order of a list.
+    void publish(const std::vector<const Sensor*>& sensors, std::vector<std::string> lostSources,
+        std::time_t time);
 
 private:
     class Subscription;
@@ -59,6 +60,7 @@ private:
 
     // These require that the mutex is held.
     bool isPublishedWithin(std::chrono::milliseconds time) const;
+    void begin(Subscription& subscription);
     Event listEvent();
     Event changesSince(const std::vector<Known>& before, std::time_t time) const;
 
@@ -68,6 +70,8 @@ private:
     std::set<Subscription*> subscriptions_;
     std::vector<Known> known_; // what was published last
     Event list_;               // of it, made when it is needed
+    std::vector<std::string> lostSources_;
+    Event sources_; // of them; null before they are published
     std::optional<Clock::time_point> published_;
     bool isAwaited_ = false; // whether publish() has to be called soon
     bool hasBegun_ = false;  // whether somebody has subscribed since the last waitUntil()

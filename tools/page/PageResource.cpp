@@ -107,15 +107,33 @@ Data textsOf(const Texts& texts)
     return result;
 }
 
+// Returns a sentence, or nothing where no source is lost. The names are isolated in it: their
+// direction is theirs (Unicode Standard Annex #9).
+std::string lostSourcesIn(const Texts& texts, const Harvest& harvest)
+{
+    std::string names;
+    for (const std::string& name : harvest.lostSources())
+        names.append(names.empty() ? "" : ", ").append("\u2068" + name + "\u2069");
+    if (names.empty())
+        return "";
+    constexpr std::string_view place = "{names}";
+    std::string sentence = textIn(texts, "lostSources");
+    if (const std::size_t at = sentence.find(place); at != std::string::npos)
+        sentence.replace(at, place.size(), names);
+    return sentence;
+}
+
 std::string render(const std::string& text, const std::string& language, const Texts& texts,
-    const Sensors& sensors)
+    const Harvest& harvest, bool isHistoryKept)
 {
     Data data;
     data.set("language", language);
     data.set("machine", Vorn::getSystemName());
     data.set("text", textsOf(texts));
-    data.set("counts", countsOf(sensors, texts));
-    data.set("chips", chipsOf(inListOrder(sensors), texts));
+    data.set("history", isHistoryKept ? "kept" : "off");
+    data.set("lostSources", lostSourcesIn(texts, harvest));
+    data.set("counts", countsOf(harvest.sensors, texts));
+    data.set("chips", chipsOf(inListOrder(harvest.sensors), texts));
     return kainjow::mustache::mustache(text).render(data); // whose method is not const
 }
 
@@ -133,8 +151,8 @@ Texts parseTexts(const std::string& name, const std::string& content)
 
 } // namespace
 
-PageResource::PageResource(
-    const WebFiles& files, SingleFlight<Harvest>& harvests, Host::Http::UnsentObjects& unsent)
+PageResource::PageResource(const WebFiles& files, SingleFlight<Harvest>& harvests,
+    bool isHistoryKept, Host::Http::UnsentObjects& unsent)
     : template_(files.contentOf("page.html"))
 {
     (void)files.contentOf(std::string("languages/") + defaultLanguage + ".json");
@@ -143,10 +161,10 @@ PageResource::PageResource(
         throw std::runtime_error("page.html: " + parsed.error_message());
     for (const std::string& name : files.namesIn("languages")) {
         const std::string language = std::filesystem::path(name).stem();
-        const auto write = [this, &harvests, &unsent, language,
+        const auto write = [this, &harvests, isHistoryKept, &unsent, language,
                                texts = parseTexts(name, files.contentOf(name))] {
             return std::make_shared<const UnsentText>(
-                render(template_, language, texts, harvests.get()->sensors), unsent);
+                render(template_, language, texts, *harvests.get(), isHistoryKept), unsent);
         };
         pages_.emplace(language, std::make_unique<SingleFlight<UnsentText>>(write));
     }

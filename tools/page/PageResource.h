@@ -16,14 +16,14 @@ namespace Tools {
 
 class WebFiles;
 
-// The page with a table of the sensors, in the language that the request prefers; in English where
-// it prefers none of the page's. Texts of sensors are escaped.
+// The page with a table of the sensors and the sources that are lost, in the language that the
+// request prefers; in English where it prefers none of the page's. Texts of sensors are escaped.
 class PageResource : public Host::Http::Resource {
 public:
     // Takes the template `page.html` and the texts in `languages`. The other arguments must outlive
     // it. Throws std::runtime_error where these files are missing or malformed.
-    PageResource(
-        const WebFiles& files, SingleFlight<Harvest>& harvests, Host::Http::UnsentObjects& unsent);
+    PageResource(const WebFiles& files, SingleFlight<Harvest>& harvests, bool isHistoryKept,
+        Host::Http::UnsentObjects& unsent);
 
     Host::Http::Representation represent(const Host::Http::RequestHead& head) override;
 

@@ -8,13 +8,13 @@
 
 namespace Tools {
 
-PageService::PageService(SingleFlight<Harvest>& harvests, const std::optional<std::string>& history,
-    const std::filesystem::path& folder)
+PageService::PageService(SingleFlight<Harvest>& harvests, bool isHistoryKept,
+    const std::optional<std::string>& historyFolder, const std::filesystem::path& folder)
     : sensors_(harvests, unsent_),
-      histories_(history == "off" ? nullptr : &history_.emplace(), unsent_)
+      histories_(isHistoryKept ? &history_.emplace() : nullptr, unsent_)
 {
-    if (history_ && history)
-        keeper_.emplace(*history_, *history);
+    if (history_ && historyFolder)
+        keeper_.emplace(*history_, *historyFolder);
     readFiles(harvests, folder);
     sampler_.emplace(harvests, feed_, history_ ? &*history_ : nullptr);
 }
@@ -23,7 +23,7 @@ void PageService::readFiles(SingleFlight<Harvest>& harvests, const std::filesyst
 {
     try {
         files_.emplace(folder);
-        page_.emplace(*files_, harvests, unsent_);
+        page_.emplace(*files_, harvests, history_.has_value(), unsent_);
     } catch (const std::exception& error) {
         absentPage_.reason = std::string("the page is not installed: ") + error.what();
         Host::Http::report({"readFiles", "PageService", __LINE__}, absentPage_.reason);

@@ -21,11 +21,11 @@ namespace Tools {
 // The page and what it is fed from, as resources of a server.
 class PageService {
 public:
-    // Keeps the history as `history` says: a folder, "off", or nothing for memory only. Without the
-    // files of the page in the folder, the page says so and the rest works. The harvests must
+    // Keeps the history, where it does, in the folder for that; without one in memory only. Without
+    // the files of the page in the folder, the page says so and the rest works. The harvests must
     // outlive it. Throws std::runtime_error where the history cannot be kept.
-    PageService(SingleFlight<Harvest>& harvests, const std::optional<std::string>& history,
-        const std::filesystem::path& folder);
+    PageService(SingleFlight<Harvest>& harvests, bool isHistoryKept,
+        const std::optional<std::string>& historyFolder, const std::filesystem::path& folder);
 
     // Adds the resources. They belong to this object.
     void addTo(Host::Http::Resources& resources);

@@ -74,7 +74,7 @@ void Sampler::sample()
         if (history_ != nullptr && std::exchange(slot_, slot) != slot)
             history_->add(sensors, now);
         if (feed_.hasSubscribers())
-            feed_.publish(sensors, SystemClock::to_time_t(now));
+            feed_.publish(sensors, harvest->lostSources(), SystemClock::to_time_t(now));
     } catch (const std::exception& error) {
         Host::Http::report({"sample", "Sampler", __LINE__},
             std::string("the sensors were not read: ") + error.what());

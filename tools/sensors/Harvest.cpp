@@ -89,6 +89,15 @@ std::map<std::string, bool> statesOfSources(const Sensors& sensors)
 
 } // namespace
 
+std::vector<std::string> Harvest::lostSources() const
+{
+    std::vector<std::string> names;
+    for (const auto& [name, isSourceUp] : sources)
+        if (!isSourceUp)
+            names.push_back(name);
+    return names;
+}
+
 Harvest readHarvest(const Host::Manager& manager, ChipDevices& devices)
 {
     const auto begin = std::chrono::steady_clock::now();

@@ -8,6 +8,7 @@
 #include <chrono>
 #include <map>
 #include <string>
+#include <vector>
 
 namespace Host {
 class Manager;
@@ -22,6 +23,9 @@ struct Harvest {
     // be read and no sensor of it is missing.
     std::map<std::string, bool> sources;
     std::chrono::duration<double> duration{};
+
+    // Returns the names of the sources that could not be read, or not whole.
+    std::vector<std::string> lostSources() const;
 };
 
 // Reads all sensors through the provider. Where a source fails, the harvest has those of the

@@ -14,6 +14,7 @@
 #include <functional>
 #include <memory>
 #include <string_view>
+#include <system_error>
 #include <vector>
 
 namespace Tools {
@@ -156,7 +157,11 @@ void ServeOptions::complete(CLI::App& parser)
     if (!history && stateFolders != nullptr && *stateFolders != '\0')
         history =
             std::string_view(stateFolders).substr(0, std::string_view(stateFolders).find(':'));
-    if (history && history != "off" && !std::filesystem::is_directory(*history))
+    isHistoryKept = history != "off";
+    if (!isHistoryKept)
+        history.reset();
+    std::error_code error; // of a folder that cannot be looked up
+    if (history && !std::filesystem::is_directory(*history, error))
         throw UsageError("--history needs a folder or off: there is no folder " + *history);
     listen.hasCertificate = certificate.has_value();
     listen.hasPasswords = passwords.has_value();

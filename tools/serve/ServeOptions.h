@@ -25,8 +25,9 @@ struct ServeOptions {
     std::optional<std::string> user;
     std::optional<std::string> compatible; // the exporter whose metrics are added
     std::optional<std::string> configuration;
-    std::optional<std::string> history; // a folder, or "off"
-    bool isCheck = false;               // whether only the options and their files are checked
+    std::optional<std::string> history; // the folder of the history; none for memory only
+    bool isHistoryKept = true;
+    bool isCheck = false; // whether only the options and their files are checked
     Host::Http::Limits http;
     Host::OperationLimits operations;
     std::chrono::seconds gracePeriod{20};
