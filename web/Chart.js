@@ -26,8 +26,7 @@ export async function loadDygraphs() {
 
 /** Returns the range of the value axis: all readings and limits, with a margin. */
 function valueRangeOf(history, { limits }) {
-    const shown = Object.entries(limits).filter(([name]) => !name.endsWith('Fatal'));
-    const values = [...shown.map(([, value]) => value), ...history.sensors.flatMap(
+    const values = [...Object.values(limits), ...history.sensors.flatMap(
         (sensor) => [...(sensor.values ?? sensor.minimum), ...(sensor.maximum ?? [])])]
         .filter((value) => value !== null);
     if (values.length === 0)

@@ -45,7 +45,7 @@ export class ChartPanel {
 
     /**
      * Shows the sensors in the address that the machine has, or had, and of them those of one unit.
-     * Says which the machine has not.
+     * Says which it does not show.
      */
     show() {
         const { address, machine } = this;
@@ -53,9 +53,7 @@ export class ChartPanel {
         const { unit } = machine.sensors.get(known[0]) ?? {};
         this.devices = known.filter((device) => machine.sensors.get(device).unit === unit)
             .slice(0, mostSensors);
-        const missing = address.devices.filter((device) => !machine.sensors.has(device));
-        setText(document.getElementById('missing'), missing.length === 0 ? ''
-            : text('missing', { names: missing.map(isolated).join(', ') }));
+        this.#nameOthers(known);
         this.panel.hidden = this.devices.length === 0;
         this.#coverPage();
         clearTimeout(this.#timer);
@@ -74,6 +72,17 @@ export class ChartPanel {
 
     focus() {
         this.title.focus();
+    }
+
+    /** Says which sensors in the address are not shown, and why; `known` are the machine's. */
+    #nameOthers(known) {
+        const missing = this.address.devices.filter((device) => !known.includes(device));
+        const others = known.filter((device) => !this.devices.includes(device))
+            .map((device) => nameOf(this.machine.sensors.get(device)));
+        const sentence = (name, names) => names.length === 0 ? ''
+            : text(name, { names: names.map(isolated).join(', '), number: mostSensors });
+        const sentences = [sentence('missing', missing), sentence('notCompared', others)];
+        setText(document.getElementById('missing'), sentences.join(' ').trim());
     }
 
     /** Takes the page out of the order of the keyboard where the panel covers it. */

@@ -105,10 +105,26 @@ class ChartTest(PageTest):
                 with self.subTest(name, scheme=scheme):
                     self.wait_for(DRAWS, 5, name)
 
-    def test_names_the_sensors_that_are_missing(self):
-        self.open_chart("?device=none:/a&device=" + CPU2 + "&device=" + CPU2)
-        self.assertEqual("The machine has no sensor \u2068none:/a\u2069 now.", self.run_script(
-            "document.querySelector('#missing').textContent"))
+    def test_draws_fatal_limits(self):
+        self.open(self.server)
+        self.driver.execute_script(
+            "window.drawn = []; const {prototype} = CanvasRenderingContext2D;"
+            "const {fillText} = prototype; prototype.fillText = function (words, ...place) {"
+            "    drawn.push(words); fillText.call(this, words, ...place); };"
+            "[...document.querySelectorAll('.chips .sensor button')].find(button =>"
+            "    button.textContent === 'CPU 2 Package Temp').click();")
+        self.wait_for("drawn.includes('High fatal 100\u00a0°C')")
+
+    def test_names_the_sensors_that_are_not_shown(self):
+        self.open_chart("?device=none:/a&device=" + CPU2 + "&device=" + CPU2 +
+                        "&device=System Fan 5:/system/fan5")
+        missing = self.driver.find_element("id", "missing")
+        self.assertEqual(
+            "The machine has no sensor \u2068none:/a\u2069 now. Not in the chart, which compares "
+            "up to 6 sensors of one unit: \u2068System Fan 5\u2069.",
+            missing.get_property("textContent"))
+        self.assertLess(missing.location["y"],
+                        self.driver.find_element("id", "troubles").location["y"])
         self.assertEqual(["CPU 2 Package Temp"], self.run_script(LEGEND))
 
     def test_lists_the_states_in_words(self):
@@ -120,7 +136,6 @@ class ChartTest(PageTest):
         self.assertTrue(any("Normal" in state for state in states), states)
 
     def test_says_when_there_is_no_history(self):
-        self.expected_errors = ("/api/history",)
         self.open(self.serve(Machine.demonstration(), is_history_kept=False),
                   "?device=" + CPU2)
         self.wait_for("document.querySelector('#plot-summary').textContent"
