@@ -47,14 +47,14 @@ std::size_t distanceFrom(std::string_view text, std::string_view name)
 bool endsWithBus(std::string_view text)
 {
     std::size_t dash = text.rfind('-');
-    if (dash != std::string::npos &&
-        text.find_first_not_of("0123456789*?", dash + 1) == text.npos) {
+    if (dash != std::string_view::npos &&
+        text.find_first_not_of("0123456789*?", dash + 1) == std::string_view::npos) {
         text = text.substr(0, dash);
         dash = text.rfind('-');
     }
     constexpr std::array<std::string_view, 9> buses = {
         "i2c", "isa", "pci", "spi", "virtual", "acpi", "hid", "mdio", "scsi"};
-    return dash != std::string::npos &&
+    return dash != std::string_view::npos &&
            std::find(buses.begin(), buses.end(), text.substr(dash + 1)) != buses.end();
 }
 
