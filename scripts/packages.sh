@@ -14,7 +14,7 @@ build_packages=(
 
 check_packages=(
   "${build_packages[@]}"
-  clang clang-format clang-tidy libclang-rt-14-dev
+  clang clang-format clang-tidy libclang-rt-14-dev lld
   libbenchmark-dev libgmock-dev libgtest-dev
   binutils lm-sensors locales python3-jsonschema util-linux
   icinga2 openssl sblim-wbemcli tmux
