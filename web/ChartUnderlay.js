@@ -4,14 +4,24 @@
 
 import { limitText, quantityText, stateText } from './Texts.js';
 import { nameOf } from './SensorRow.js';
-import { urgencyOf } from './States.js';
+import { shapes, urgencyOf } from './States.js';
 
 const stripHeight = 17;
 const margin = 4;
+const shapeSize = 12;
 
 /** Returns a color or font of the style sheet by the name of its variable. */
 export const styleValue = (name) =>
     getComputedStyle(document.documentElement).getPropertyValue(name).trim();
+
+/** Draws the shape of an urgency, also where a state is too short for its word. */
+function drawShape(canvas, urgency, left, top) {
+    canvas.save();
+    canvas.translate(left, top);
+    canvas.scale(shapeSize / 16, shapeSize / 16);
+    canvas.fill(new Path2D(shapes[urgency]), 'evenodd');
+    canvas.restore();
+}
 
 /**
  * Fills the plot behind one sensor's states. Each of several sensors has a strip at the bottom,
@@ -33,12 +43,13 @@ function drawStates(canvas, area, chart, sensors, runsOfSensors) {
             const height = isStrip ? stripHeight - 1 : area.h;
             canvas.fillRect(left, bottom - height, right - left, height);
             const longWords = `${nameOf(sensors[index])}: ${stateText(state)}`;
+            const wordsLeft = left + shapeSize + margin;
             const words = (isStrip ? [longWords, stateText(state)] : [stateText(state)]).find(
-                (each) => canvas.measureText(each).width + 2 * margin < right - left);
-            if (words) {
-                canvas.fillStyle = styleValue(`--${urgency}`);
-                canvas.fillText(words, left + margin, bottom - margin);
-            }
+                (each) => canvas.measureText(each).width + margin < right - wordsLeft);
+            canvas.fillStyle = styleValue(`--${urgency}`);
+            drawShape(canvas, urgency, left + 1, bottom - shapeSize - margin / 2);
+            if (words)
+                canvas.fillText(words, wordsLeft, bottom - margin);
         }
     });
 }

@@ -105,15 +105,17 @@ class ChartTest(PageTest):
                 with self.subTest(name, scheme=scheme):
                     self.wait_for(DRAWS, 5, name)
 
-    def test_draws_fatal_limits(self):
+    def test_draws_fatal_limits_and_the_shapes_of_states(self):
         self.open(self.server)
         self.driver.execute_script(
-            "window.drawn = []; const {prototype} = CanvasRenderingContext2D;"
-            "const {fillText} = prototype; prototype.fillText = function (words, ...place) {"
+            "window.drawn = []; window.shapes = 0; const {prototype} = CanvasRenderingContext2D;"
+            "const {fill, fillText} = prototype; prototype.fill = function (...path) {"
+            "    shapes += path[0] instanceof Path2D; fill.apply(this, path); }; prototype.fillText = function (words, ...place) {"
             "    drawn.push(words); fillText.call(this, words, ...place); };"
             "[...document.querySelectorAll('.chips .sensor button')].find(button =>"
             "    button.textContent === 'CPU 2 Package Temp').click();")
         self.wait_for("drawn.includes('High fatal 100\u00a0°C')")
+        self.assertLess(0, self.run_script("shapes"))
 
     def test_names_the_sensors_that_are_not_shown(self):
         self.open_chart("?device=none:/a&device=" + CPU2 + "&device=" + CPU2 +
