@@ -111,9 +111,14 @@ Data textsOf(const Texts& texts)
 // direction is theirs (Unicode Standard Annex #9).
 std::string lostSourcesIn(const Texts& texts, const Harvest& harvest)
 {
+    constexpr std::string_view isolated = "\u2068\u2069"; // the characters around a name
+    constexpr std::size_t half = isolated.size() / 2;
     std::string names;
     for (const std::string& name : harvest.lostSources())
-        names.append(names.empty() ? "" : ", ").append("\u2068" + name + "\u2069");
+        names.append(names.empty() ? "" : ", ")
+            .append(isolated.substr(0, half))
+            .append(name)
+            .append(isolated.substr(half));
     if (names.empty())
         return "";
     constexpr std::string_view place = "{names}";

@@ -32,7 +32,10 @@ Sampler::Sampler(SingleFlight<Harvest>& harvests, ChangeFeed& feed, SensorHistor
 bool Sampler::stop(std::chrono::milliseconds timeout)
 {
     thread_.request_stop();
-    return end_.get_future().wait_for(timeout) == std::future_status::ready;
+    if (end_.get_future().wait_for(timeout) != std::future_status::ready)
+        return false;
+    thread_.join();
+    return true;
 }
 
 void Sampler::run(const std::stop_token& stop)
