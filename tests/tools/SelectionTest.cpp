@@ -20,6 +20,12 @@ protected:
         return run(more);
     }
 
+    // Returns the sensors of a model file that the selector selects.
+    nlohmann::json selectedOf(const std::string& file, const std::string& selector) const
+    {
+        return nlohmann::json::parse(run({"list", "--json", "--model", file, selector}).out);
+    }
+
     std::vector<std::string> idsOf(const std::vector<std::string>& more) const
     {
         std::vector<std::string> ids;
@@ -47,7 +53,7 @@ TEST_F(SelectionTest, LettersOfAllScriptsAreSelectedInAnyCase)
         { "type": "tachometer", "path": "/gehäuse/fan2", "description": "вентилятор", "status": 1 },
         { "type": "tachometer", "path": "/x/fan3", "description": "Straße", "status": 1 })");
     const auto found = [&](const std::string& selector) {
-        return nlohmann::json::parse(run({"list", "--json", "--model", file, selector}).out).size();
+        return selectedOf(file, selector).size();
     };
     for (const char* const selector :
         {"lüfter", "LÜFTER", "*üf*", "l?fter", "L[Üö]FTER", "ВЕНТИЛЯТОР", "Вент*", "STRAßE"})
@@ -68,8 +74,7 @@ TEST_F(SelectionTest, AddressesOfChipsMayBeShortened)
         { "type": "tachometer", "path": "/hwmon/jc42-i2c-0-1a/fan1", "description": "C", "status": 1 })");
     const auto labels = [&](const std::string& selector) {
         std::string found;
-        for (const auto& sensor :
-            nlohmann::json::parse(run({"list", "--json", "--model", file, selector}).out))
+        for (const auto& sensor : selectedOf(file, selector))
             found += sensor.at("label");
         return found;
     };
