@@ -2,10 +2,8 @@
 
 #include "tools/CommandLine.h"
 
-#include "tools/Command.h"
 #include "tools/LibraryLog.h"
 #include "tools/UsageError.h"
-#include "tools/commands/Commands.h"
 #include "tools/output/Output.h"
 
 #include <CLI/CLI.hpp>
@@ -18,9 +16,7 @@
 #include <cerrno> // program_invocation_name
 #include <cstddef>
 #include <exception>
-#include <memory>
 #include <string>
-#include <vector>
 
 namespace Tools {
 
@@ -37,23 +33,6 @@ std::string versionText()
     constexpr int cmpi = CMPI_VERSION;
     return "sensorctl " SENSOR_PROFILE_VERSION " (CMPI " + std::to_string(cmpi / 100) + "." +
            std::to_string(cmpi % 100 / 10) + ")";
-}
-
-using Commands = std::vector<std::unique_ptr<Command>>;
-
-Commands addCommands(CLI::App& tool)
-{
-    Commands commands;
-    commands.push_back(makeListCommand(tool));
-    commands.push_back(makeGetCommand(tool));
-    commands.push_back(makeWalkCommand(tool));
-    commands.push_back(makeWatchCommand(tool));
-    commands.push_back(makeCheckCommand(tool));
-    commands.push_back(makeRecordCommand(tool));
-    commands.push_back(makeCollectCommand(tool));
-    commands.push_back(makeMetricsCommand(tool));
-    commands.push_back(makeServeCommand(tool));
-    return commands;
 }
 
 // Returns null when the command line names no command.
@@ -104,7 +83,8 @@ ExitCode print(Output& out, const std::string& text)
     return ExitCode::success;
 }
 
-ExitCode run(int argc, const char* const* argv)
+ExitCode run(
+    int argc, const char* const* argv, const std::function<Commands(CLI::App&)>& addCommands)
 {
     CLI::App tool(
         "Shows the hardware sensors of this machine as CIM clients see them.", "sensorctl");
@@ -138,11 +118,12 @@ ExitCode run(int argc, const char* const* argv)
 
 } // namespace
 
-int runTool(int argc, const char* const* argv)
+int runTool(
+    int argc, const char* const* argv, const std::function<Commands(CLI::App&)>& addCommands)
 {
     reserveStandardStreams();
     try {
-        return static_cast<int>(run(argc, argv));
+        return static_cast<int>(run(argc, argv, addCommands));
     } catch (const std::exception& error) {
         complain(error.what());
         return static_cast<int>(ExitCode::failure);

@@ -74,8 +74,8 @@ TEST_P(InstalledBinaryTest, IsToldNoFoldersOfLibraries)
 }
 
 INSTANTIATE_TEST_SUITE_P(InstalledBinaries, InstalledBinaryTest,
-    testing::Values(
-        "bin/sensorctl", "libexec/sensor-profile/sensorctl-collect", sensorLibrary, systemLibrary));
+    testing::Values("bin/sensorctl", "libexec/sensor-profile/sensorctl-collect",
+        "libexec/sensor-profile/sensorctl-serve", sensorLibrary, systemLibrary));
 
 TEST(InstalledLibraryTest, ExportsItsFactoriesAndNothingElse)
 {
@@ -93,11 +93,20 @@ TEST(InstalledLibraryTest, ExportsItsFactoriesAndNothingElse)
             "SensorRegisteredProfileProvider_Create_InstanceMI"));
 }
 
+const std::set<std::string> common = {
+    "libc", "libgcc_s", "libstdc++", "libm", "ld-linux-x86-64", "ld-linux-aarch64"};
+
+// Loading the libraries of the server takes longer than reading a few sensors.
+TEST(InstalledToolTest, NeedsNothingOfTheServer)
+{
+    std::set<std::string> forTool = {"libfmt", "libncursesw", "libtinfo"};
+    forTool.insert(common.begin(), common.end());
+    EXPECT_THAT(neededLibraries("bin/sensorctl"), IsSubsetOf(forTool));
+}
+
 // An object manager loads every library that a provider depends on.
 TEST(InstalledLibraryTest, NeedsNothingOfTheServer)
 {
-    const std::set<std::string> common = {
-        "libc", "libgcc_s", "libstdc++", "libm", "ld-linux-x86-64", "ld-linux-aarch64"};
     std::set<std::string> forSensors = {"libfmt"};
     forSensors.insert(common.begin(), common.end());
     std::set<std::string> forSystems = {"libsystemd"};

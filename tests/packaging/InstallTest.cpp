@@ -4,9 +4,12 @@
 
 #include "tests/packaging/Installation.h"
 #include "tests/support/ExportedNames.h"
+#include "tests/tools/ServerProcess.h"
 #include "tests/tools/ToolTest.h"
 
 #include <gmock/gmock.h>
+
+#include <csignal>
 
 namespace InstallTests {
 
@@ -44,10 +47,10 @@ const std::vector<std::string> providerFiles = {"lib/cmpi/libSensorProfileComput
 const std::vector<std::string> toolFiles = {"bin/sensorctl", "etc/sensor-profile/serve.conf",
     "lib/systemd/system/sensor-profile-collect.service",
     "lib/systemd/system/sensor-profile.service", "lib/udev/rules.d/60-sensor-profile-collect.rules",
-    "libexec/sensor-profile/sensorctl-collect", "share/bash-completion/completions/sensorctl",
-    "share/doc/sensor-profile/changelog.gz", "share/doc/sensor-profile/fleet.md",
-    "share/man/man1/sensorctl.1.gz", "share/sensor-profile/demo-model.json",
-    "share/sensor-profile/deploy/grafana/fleet.json",
+    "libexec/sensor-profile/sensorctl-collect", "libexec/sensor-profile/sensorctl-serve",
+    "share/bash-completion/completions/sensorctl", "share/doc/sensor-profile/changelog.gz",
+    "share/doc/sensor-profile/fleet.md", "share/man/man1/sensorctl.1.gz",
+    "share/sensor-profile/demo-model.json", "share/sensor-profile/deploy/grafana/fleet.json",
     "share/sensor-profile/deploy/grafana/machine.json",
     "share/sensor-profile/deploy/prometheus/alertmanager.yml",
     "share/sensor-profile/deploy/prometheus/prometheus.yml",
@@ -93,6 +96,14 @@ TEST(InstalledTest, ToolShowsTheDemonstration)
     EXPECT_EQ(ended.code, 0);
     EXPECT_EQ(
         ended.out, contentOf(SENSOR_PROFILE_SOURCE_DIR "/tests/data/tools/demonstration-list.txt"));
+}
+
+TEST(InstalledTest, ServerFindsItsFiles)
+{
+    const std::string model = installedFile("share/sensor-profile/demo-model.json");
+    ServerProcess server({"--model", model}, {}, installedFile("bin/sensorctl"));
+    EXPECT_THAT(server.log(), Not(HasSubstr("the page is not installed")));
+    EXPECT_EQ(server.end(SIGTERM).code, 0);
 }
 
 TEST(InstalledTest, ToolFindsTheCatalogs)

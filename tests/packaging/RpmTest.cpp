@@ -185,7 +185,7 @@ protected:
         static const TemporaryFolder system;
         static const Ended made = shell(
             "'" SENSOR_PROFILE_SOURCE_DIR "/tests/packaging/rpm-system' " + system.path().string() +
-            " " + sensorctl + " " + sensorLibrary + " " + systemLibrary);
+            " " + sensorctl + " " + sensorctl + "-serve " + sensorLibrary + " " + systemLibrary);
         ASSERT_EQ(made.code, 0) << made.out << made.err;
         rpm("-i " + (system.path() / "system.rpm").string());
         before_ = entries();

@@ -161,6 +161,15 @@ TEST_F(FailureTest, ToolWithoutItsClassesSaysWhichFileIsMissing)
                              "/share/sensor-profile/host.mof: No such file or directory\n");
 }
 
+TEST_F(FailureTest, ServerThatIsNotInstalledIsNamed)
+{
+    const std::string moved = install();
+    std::filesystem::remove_all(folder_.path() / "libexec");
+    const Ended ended = run({"serve", "--model", smallModel()}, {.program = moved});
+    EXPECT_EQ(ended.code, 1);
+    EXPECT_EQ(ended.err, "sensorctl: " + moved + "-serve: No such file or directory\n");
+}
+
 TEST_F(FailureTest, ClassesThatCannotBeCompiledAreTheReason)
 {
     const std::string moved = install();

@@ -43,13 +43,17 @@ protected:
               "baseUnits": 19 })");
     }
 
-    // Copies the tool and its classes to a folder laid out as an installation, without the
-    // libraries. Returns the path of the executable.
+    // Copies the tool, its server and its classes to a folder laid out as an installation, without
+    // the libraries. Returns the path of the executable.
     std::string install() const
     {
         const auto moved = folder_.path() / "bin" / "sensorctl";
-        std::filesystem::create_directory(moved.parent_path());
-        std::filesystem::copy_file(sensorctl, moved);
+        const auto server = folder_.path() / "libexec" / "sensor-profile" / "sensorctl-serve";
+        for (const auto& [from, to] :
+            {std::pair(sensorctl, moved), {sensorctl + "-serve", server}}) {
+            std::filesystem::create_directories(to.parent_path());
+            std::filesystem::copy_file(from, to);
+        }
         std::filesystem::copy(SENSOR_PROFILE_BINARY_DIR "/share", folder_.path() / "share",
             std::filesystem::copy_options::recursive);
         return moved.string();

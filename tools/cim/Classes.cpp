@@ -3,17 +3,16 @@
 #include "tools/cim/Classes.h"
 
 #include "host/repository/Compiler.h"
+#include "tools/Installation.h"
 #include "tools/cim/ProviderClient.h"
 
-#include <filesystem>
 #include <utility>
 
 namespace Tools {
 
 std::filesystem::path installedFolder()
 {
-    const auto here = std::filesystem::read_symlink("/proc/self/exe").parent_path();
-    return (here / "../share/sensor-profile").lexically_normal();
+    return installationPrefix() / "share/sensor-profile";
 }
 
 std::unique_ptr<const Host::Repository> compileClasses()

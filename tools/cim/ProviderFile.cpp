@@ -2,8 +2,9 @@
 
 #include "tools/cim/ProviderFile.h"
 
+#include "tools/Installation.h"
+
 #include <array>
-#include <filesystem>
 #include <stdexcept>
 #include <vector>
 
@@ -14,18 +15,18 @@ namespace {
 constexpr const char* sensorLibrary = "libSensorProfileProvider.so";
 constexpr const char* computerSystemLibrary = "libSensorProfileComputerSystem.so";
 
-// Relative to the folder of the tool's executable. Object managers load providers from `cmpi`
-// folders; SENSOR_PROFILE_ARCHITECTURE is Debian's name, such as x86_64-linux-gnu.
-constexpr std::array folders = {"../lib", "../lib/cmpi", "../lib/" SENSOR_PROFILE_ARCHITECTURE,
-    "../lib/" SENSOR_PROFILE_ARCHITECTURE "/cmpi", "../lib64", "../lib64/cmpi"};
+// Relative to the prefix of the installation. Object managers load providers from `cmpi` folders;
+// SENSOR_PROFILE_ARCHITECTURE is Debian's name, such as x86_64-linux-gnu.
+constexpr std::array folders = {"lib", "lib/cmpi", "lib/" SENSOR_PROFILE_ARCHITECTURE,
+    "lib/" SENSOR_PROFILE_ARCHITECTURE "/cmpi", "lib64", "lib64/cmpi"};
 
 std::vector<std::filesystem::path> places()
 {
-    const auto here = std::filesystem::read_symlink("/proc/self/exe").parent_path();
+    const auto prefix = installationPrefix();
     std::vector<std::filesystem::path> found;
     found.reserve(folders.size());
     for (const char* const folder : folders)
-        found.push_back((here / folder).lexically_normal());
+        found.push_back(prefix / folder);
     return found;
 }
 

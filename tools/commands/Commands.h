@@ -7,6 +7,8 @@
 #include "tools/Command.h"
 
 #include <memory>
+#include <string>
+#include <vector>
 
 namespace Tools {
 
@@ -18,6 +20,7 @@ std::unique_ptr<Command> makeCheckCommand(CLI::App& tool);
 std::unique_ptr<Command> makeRecordCommand(CLI::App& tool);
 std::unique_ptr<Command> makeCollectCommand(CLI::App& tool);
 std::unique_ptr<Command> makeMetricsCommand(CLI::App& tool);
-std::unique_ptr<Command> makeServeCommand(CLI::App& tool);
+// Takes the words of the command line, which the program of the server parses again.
+std::unique_ptr<Command> makeServeCommand(CLI::App& tool, std::vector<std::string> words);
 
 } // namespace Tools

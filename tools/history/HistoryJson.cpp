@@ -61,7 +61,7 @@ private:
             json_ += "null";
         else
             appendString(json_, stateNumbered(state_).word);
-        json_ += "," + std::to_string(count_) + "]";
+        json_.append(",").append(std::to_string(count_)).append("]");
         count_ = 0;
     }
 

@@ -53,8 +53,7 @@ FileResource::Form formOf(const std::filesystem::path& path)
     auto content = std::make_shared<const std::string>(readFile(path));
     const auto sum =
         ::crc32_z(0, reinterpret_cast<const unsigned char*>(content->data()), content->size());
-    std::string entityTag =
-        "\"" + std::to_string(content->size()) + "-" + std::to_string(sum) + "\"";
+    auto entityTag = '"' + std::to_string(content->size()) + "-" + std::to_string(sum) + '"';
     return {std::move(content), std::move(entityTag)};
 }
 
