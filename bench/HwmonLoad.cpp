@@ -10,6 +10,7 @@
 
 #include "bench/HwmonTree.h"
 #include "bench/Median.h"
+#include "bench/ProcessorTime.h"
 #include "bench/ServerProcess.h"
 #include "bench/Skim.h"
 #include "host/broker/Broker.h"
@@ -38,13 +39,13 @@
 #include <cstddef>
 #include <cstdio>
 #include <cstdlib>
-#include <ctime>
 #include <exception>
 #include <functional>
 #include <memory>
 #include <stdexcept>
 #include <string>
 #include <string_view>
+#include <thread>
 #include <vector>
 
 namespace {
@@ -64,20 +65,24 @@ double milliseconds(Clock::duration duration)
     return std::chrono::duration<double, std::milli>(duration).count();
 }
 
-double cpuTime(::clockid_t clock)
+Cost costOf(const std::function<void()>& work)
 {
-    ::timespec time{};
-    ::clock_gettime(clock, &time);
-    return static_cast<double>(time.tv_sec) * 1e3 + static_cast<double>(time.tv_nsec) / 1e6;
-}
-
-// Returns what the work costs the process that the clock belongs to.
-Cost costOf(const std::function<void()>& work, ::clockid_t clock = CLOCK_PROCESS_CPUTIME_ID)
-{
-    const double cpu = cpuTime(clock);
+    const double cpu = Bench::processorTime();
     const auto wall = Clock::now();
     work();
-    return {cpuTime(clock) - cpu, milliseconds(Clock::now() - wall)};
+    return {Bench::processorTime() - cpu, milliseconds(Clock::now() - wall)};
+}
+
+// Returns what the work costs the server, with the time that it takes to free the answer.
+Cost costOf(const std::function<void()>& work, const Bench::ServerProcess& server)
+{
+    const ::clockid_t clock = Bench::clockOf(server.id());
+    const double cpu = Bench::processorTime(clock);
+    const auto begin = Clock::now();
+    work();
+    const double wall = milliseconds(Clock::now() - begin);
+    std::this_thread::sleep_for(std::chrono::milliseconds(5));
+    return {Bench::processorTime(clock) - cpu, wall};
 }
 
 void expect(bool holds, const char* what)
@@ -210,13 +215,6 @@ Cost program(const std::string& file, const std::vector<std::string>& arguments)
     return {childrenTime() - cpu, wall};
 }
 
-::clockid_t clockOf(::pid_t process)
-{
-    ::clockid_t clock{};
-    expect(::clock_getcpuclockid(process, &clock) == 0, "a server that has ended");
-    return clock;
-}
-
 // ---- The table ----
 
 struct Row {
@@ -305,9 +303,8 @@ void compare(const HwmonTree& tree, std::size_t rounds)
         {"EnumInstances", "harvest", [&] { return costOf(enumInstances); }},
         {"GetInstance", "harvest", [&] { return costOf(getInstance); }},
         {"EnumerateInstances of the server", "EnumInstances",
-            [&] { return costOf(overHttp, clockOf(server.id())); }},
-        {"GET /metrics of the server", "EnumInstances",
-            [&] { return costOf(scrape, clockOf(server.id())); }},
+            [&] { return costOf(overHttp, server); }},
+        {"GET /metrics of the server", "EnumInstances", [&] { return costOf(scrape, server); }},
         {"sensors -j", "sensors -j", [] { return program("/usr/bin/sensors", {"-j"}); }},
         {"libsensors' list and raw reads", "sensors -j",
             [] { return program("/proc/self/exe", {"list"}); }},

@@ -7,6 +7,7 @@
 
 #include "bench/Median.h"
 #include "bench/ModelMachine.h"
+#include "bench/ProcessorTime.h"
 #include "bench/ServerProcess.h"
 #include "bench/Skim.h"
 #include "host/broker/Broker.h"
@@ -171,35 +172,45 @@ void enumerateHere(const Host::Broker& broker, CMPIInstanceMI& mi, std::size_t s
         throw std::runtime_error("an answer in this process is not whole");
 }
 
+// Prints what requests cost the server against EnumInstances in this process, which writes no text.
 void printComparison()
 {
     constexpr std::int64_t sensors = 1000;
     constexpr int rounds = 200;
     const ModelMachine machine(sensors);
     const ServerProcess server;
+    const ::clockid_t clock = Bench::clockOf(server.id());
     const Host::Broker broker;
     CMPIInstanceMI& mi =
         *SensorProfileProvider_Create_InstanceMI(broker.handle(), nullptr, nullptr);
-    HttpClient client(server.port());
-    const std::string request = enumerateInstances();
-    client.send(request);
-    check(client.receive(), sensors);
-    Durations here;
-    Durations there;
-    std::size_t bytes = 0;
-    for (int i = 0; i < rounds; ++i) { // alternately, for the same load of the machine
-        auto begin = Clock::now();
-        enumerateHere(broker, mi, sensors);
-        here.push_back(Milliseconds(Clock::now() - begin).count());
-        begin = Clock::now();
-        client.send(request);
-        bytes = skim(client);
-        there.push_back(Milliseconds(Clock::now() - begin).count());
+    std::puts("| request | ms | processor time, ms | times EnumInstances | in processor time |\n"
+              "|---|---|---|---|---|");
+    for (const Load& load : {enumeration(sensors), scrape(sensors)}) {
+        HttpClient client(server.port());
+        client.send(load.request);
+        check(client.receive(), sensors, load.part);
+        Durations here;
+        Durations hereOnProcessor;
+        Durations there;
+        Durations thereOnProcessor;
+        for (int i = 0; i < rounds; ++i) { // alternately, for the same load of the machine
+            const double before = Bench::processorTime(clock);
+            auto begin = Clock::now();
+            client.send(load.request);
+            skim(client);
+            there.push_back(Milliseconds(Clock::now() - begin).count());
+            const double own = Bench::processorTime();
+            begin = Clock::now();
+            enumerateHere(broker, mi, sensors);
+            here.push_back(Milliseconds(Clock::now() - begin).count());
+            hereOnProcessor.push_back(Bench::processorTime() - own);
+            // With the time that the server takes to free the answer.
+            thereOnProcessor.push_back(Bench::processorTime(clock) - before);
+        }
+        std::printf("| %s of %ld sensors | %.2f | %.2f | %.2f | %.2f |\n", load.operation,
+            static_cast<long>(sensors), median(there), median(thereOnProcessor),
+            median(there) / median(here), median(thereOnProcessor) / median(hereOnProcessor));
     }
-    std::printf("EnumerateInstances of %ld sensors: %.2f ms in process, %.2f ms over HTTP "
-                "(%zu bytes), ratio %.2f\n",
-        static_cast<long>(sensors), median(here), median(there), bytes,
-        median(there) / median(here));
 }
 
 void printLargeAnswer()
