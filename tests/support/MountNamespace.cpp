@@ -174,6 +174,13 @@ void BoundSysfs::addChip(const std::string& folder, const std::string& name, con
     write(chip + "/name", name + "\n");
 }
 
+void BoundSysfs::addInterface(const std::string& address, const std::string& name)
+{
+    fs::create_directories(path("net"));
+    fs::create_directories(path("devices") / address / "net" / name);
+    fs::create_symlink("../devices/" + address + "/net/" + name, path("net/" + name));
+}
+
 BoundSensorsConfiguration::BoundSensorsConfiguration(const std::string& text)
     : file_(folder_.path() / "sensors3.conf"), mount_(written(file_, text), "/etc/sensors3.conf")
 {

@@ -58,6 +58,9 @@ public:
     void addChip(const std::string& folder, const std::string& name, const std::string& bus,
         const std::string& address);
 
+    // Adds a network interface to the device at the address.
+    void addInterface(const std::string& address, const std::string& name);
+
 private:
     TemporaryFolder tree_;
     BindMount mount_;

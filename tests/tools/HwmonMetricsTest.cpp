@@ -11,7 +11,9 @@
 
 #include <gmock/gmock.h>
 
+#include <chrono>
 #include <optional>
+#include <thread>
 
 namespace {
 
@@ -255,17 +257,44 @@ TEST_F(HwmonMetricsTest, DevicesAreThoseOfThePresentChips)
     const ServerProcess server({});
     EXPECT_EQ(
         devicesIn(scrape(server)), (Devices{{"nvme-pci-0100", "first"}, {"nic-pci-0200", ""}}));
-    std::filesystem::create_directories(sysfs_->path("devices/0000:02:00.0/net/eth0"));
+    sysfs_->addInterface("0000:02:00.0", "eth0");
     EXPECT_EQ(devicesIn(scrape(server)).at("nic-pci-0200"), "eth0");
-    sysfs_->rename("devices/0000:02:00.0/net/eth0", "devices/0000:02:00.0/net/enp2s0");
+    sysfs_->remove("net/eth0");
+    sysfs_->addInterface("0000:02:00.0", "enp2s0");
     EXPECT_EQ(devicesIn(scrape(server)).at("nic-pci-0200"), "enp2s0");
-    std::filesystem::create_directories(sysfs_->path("devices/0000:02:00.0/net/enp2s0f1"));
+    sysfs_->addInterface("0000:02:00.0", "enp2s0f1");
     EXPECT_EQ(devicesIn(scrape(server)).at("nic-pci-0200"), "enp2s0"); // the first by name
 
     sysfs_->rename("hwmon/hwmon0", "gone"); // its inode stays in use
     std::filesystem::remove_all(sysfs_->path("devices/0000:01:00.0"));
     addDisk("second");
     EXPECT_EQ(devicesIn(scrape(server)).at("nvme-pci-0100"), "second");
+}
+
+TEST_F(HwmonMetricsTest, SourceIsUpUnlessItsChipsCannotBeListed)
+{
+    const std::string up = "\nsensor_profile_source_up{source=\"hwmon\"} ";
+    bind("");
+    add("hwmon0/name", "first");
+    add("hwmon0/temp1_input", "41000");
+    add("hwmon0/fan1_input", "900");
+    const ServerProcess server({});
+    EXPECT_THAT(scrape(server), HasSubstr(up + "1\n"));
+
+    sysfs_->rename("hwmon", "gone");
+    std::filesystem::create_symlink("hwmon", sysfs_->path("hwmon"));
+    std::string text = scrape(server);
+    EXPECT_THAT(text, HasSubstr(up + "0\n"));
+    EXPECT_EQ(countOf(text, "\nsensor_profile_health{"), 0U);
+    sysfs_->remove("hwmon");
+    sysfs_->rename("gone", "hwmon");
+
+    // The driver removes an attribute, which the library sees within two seconds.
+    sysfs_->remove("hwmon/hwmon0/fan1_input");
+    std::this_thread::sleep_for(std::chrono::milliseconds(2100));
+    text = scrape(server);
+    EXPECT_THAT(text, HasSubstr(up + "1\n"));
+    EXPECT_EQ(countOf(text, "\nsensor_profile_health{"), 1U);
 }
 
 } // namespace

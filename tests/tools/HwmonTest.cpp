@@ -143,7 +143,9 @@ TEST_F(ChipDevicesTest, AreNamedWhereTheKernelKnowsThem)
     add("hwmon0", "drivetemp", "scsi", "7:0:0:0");
     sysfs_->write("hwmon/hwmon0/device/model", "WDC WD80EFAX    \n");
     add("hwmon1", "mlx5", "pci", "0000:3b:00.1");
-    std::filesystem::create_directories(sysfs_->path("hwmon/hwmon1/device/net/eth4"));
+    sysfs_->addInterface("0000:3b:00.1", "eth4");
+    sysfs_->addInterface("virtual", "veth0");
+    sysfs_->write("net/bonding_masters", "\n");
     add("hwmon2", "jc42", "i2c", "0-0018");
     add("hwmon3", "nvme", "pci", "10000:01:00.0");
     sysfs_->write("hwmon/hwmon3/device/model", "SOLIDIGM\n");
@@ -171,7 +173,7 @@ TEST_F(ChipDevicesTest, SlotsBatteriesAndWirelessInterfacesAreNamed)
     add("hwmon3", "mt7921_phy0", "pci", "0000:02:00.0");
     const auto card = sysfs_->path("devices/0000:02:00.0");
     std::filesystem::create_directories(card / "ieee80211/phy0");
-    std::filesystem::create_directories(card / "net/wlan0");
+    sysfs_->addInterface("0000:02:00.0", "wlan0");
     std::filesystem::create_symlink(
         "../../../../class/ieee80211", card / "ieee80211/phy0/subsystem");
     std::filesystem::create_symlink("../..", card / "ieee80211/phy0/device");

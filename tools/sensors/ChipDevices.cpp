@@ -13,6 +13,7 @@
 #include <set>
 #include <string_view>
 #include <system_error>
+#include <unordered_map>
 #include <utility>
 
 namespace Tools {
@@ -58,14 +59,12 @@ std::optional<std::string> suffixFor(const std::string& device)
     return std::nullopt;
 }
 
-// Returns the names and the identities of the chips' folders; none when they cannot be listed.
-auto presentChips()
+// Returns whether the chip is on a bus whose devices have names.
+bool mayHaveDevice(const Sensor& sensor)
 {
-    try {
-        return Vorn::Hwmon::presentMachine().chips;
-    } catch (const std::system_error&) {
-        return decltype(Vorn::Hwmon::Machine::chips)();
-    }
+    constexpr std::array<std::string_view, 3> buses = {"-scsi-", "-pci-", "-acpi-"};
+    return std::any_of(buses.begin(), buses.end(),
+        [&](std::string_view bus) { return sensor.chip.find(bus) != std::string::npos; });
 }
 
 } // namespace
@@ -77,33 +76,63 @@ ChipDevices::Chip ChipDevices::chipIn(const std::string& folder)
     const Files::path real = Files::canonical(folder + "/device", failure);
     if (failure)
         return chip;
-    chip.suffix = "-acpi-0";
+    std::string suffix = "-acpi-0";
     chip.folders = {real};
     // A class device, such as that of a controller, may stand between the chip and its address.
     for (Files::path place = real; place.has_relative_path(); place = place.parent_path())
-        if (const auto suffix = suffixFor(place.filename().string())) {
-            chip.suffix = *suffix;
+        if (auto found = suffixFor(place.filename().string())) {
+            suffix = std::move(*found);
             if (place != real)
                 chip.folders.push_back(place);
             break;
         }
+    chip.name = lineIn(folder + "/name") + suffix;
     chip.model = lineIn(folder + "/device/model");
     if (chip.model.empty())
         chip.model = lineIn(folder + "/device/model_name");
     return chip;
 }
 
-// Looks for network interfaces each time, as udev renames them while their chip stays.
-std::string ChipDevices::deviceOf(const Chip& chip) const
+// Returns the first interface of each device that has some. Lists them each time, as udev renames
+// them while their chip stays: all at once, since most chips have none.
+ChipDevices::Interfaces ChipDevices::networkInterfaces()
+{
+    const Files::path folder = "/sys/class/net";
+    Interfaces first;
+    for (const std::string& name : entriesOf(folder)) {
+        std::error_code failure;
+        const Files::path link = Files::read_symlink(folder / name, failure);
+        if (failure || link.native().find("/virtual/") != std::string::npos)
+            continue;
+        // The folder of the device has a folder "net" with one of the interface.
+        const Files::path device = (folder / link).lexically_normal().parent_path().parent_path();
+        auto& interface = first.try_emplace(device, name).first->second;
+        interface = std::min(interface, name);
+    }
+    return first;
+}
+
+std::string ChipDevices::deviceOf(const Chip& chip, const Interfaces& interfaces) const
 {
     if (!chip.model.empty())
         return chip.model;
     for (const std::string& folder : chip.folders)
-        if (const auto interfaces = entriesOf(folder + "/net"); !interfaces.empty())
-            return *std::min_element(interfaces.begin(), interfaces.end());
+        if (const auto found = interfaces.find(folder); found != interfaces.end())
+            return found->second;
     const std::string address = Files::path(chip.folders.back()).filename();
     const auto slot = slotAt_.find(address.substr(0, address.rfind('.')));
     return slot == slotAt_.end() ? "" : "PCI slot " + slot->second;
+}
+
+void ChipDevices::renewChips(const Vorn::Hwmon::Machine& machine)
+{
+    decltype(chips_) present;
+    for (const auto& folder : machine.chips)
+        if (auto known = chips_.extract(folder))
+            present.insert(std::move(known));
+        else
+            present.emplace(folder, chipIn(std::string(hwmonFolder).append("/") + folder.first));
+    chips_ = std::move(present);
 }
 
 void ChipDevices::renewSlots()
@@ -119,38 +148,28 @@ void ChipDevices::renewSlots()
             slotAt_.emplace(std::move(address), slot);
 }
 
-void ChipDevices::nameIn(Sensors& sensors)
+void ChipDevices::nameIn(Sensors& sensors, const Vorn::Hwmon::Machine& machine)
 {
-    constexpr std::array<std::string_view, 3> buses = {"-scsi-", "-pci-", "-acpi-"};
-    std::set<std::string> named; // the beginnings of names of chips that may have a device
-    for (const Sensor& sensor : sensors)
-        for (const std::string_view bus : buses)
-            if (const auto end = sensor.chip.rfind(bus); end != std::string::npos)
-                named.insert(sensor.chip.substr(0, end));
-    if (named.empty())
+    if (std::none_of(sensors.begin(), sensors.end(), mayHaveDevice))
         return;
+    renewChips(machine);
     renewSlots();
-    std::map<std::string, Known> present;
-    std::map<std::string, std::string> devices; // by the name of the chip
-    for (const auto& [entry, id] : presentChips()) {
-        const std::string folder = std::string(hwmonFolder).append("/").append(entry);
-        const auto before = known_.find(entry);
-        Known& known = present[entry];
-        if (before != known_.end() && before->second.id == id)
-            known = std::move(before->second);
-        else
-            known = {id, lineIn(folder + "/name"), std::nullopt};
-        if (!named.contains(known.name))
-            continue;
-        if (!known.chip)
-            known.chip = chipIn(folder);
-        if (!known.chip->folders.empty())
-            devices.emplace(known.name + known.chip->suffix, deviceOf(*known.chip));
-    }
+    const Interfaces interfaces = networkInterfaces();
+    std::unordered_map<std::string_view, std::string> devices; // by the name of the chip
+    for (const auto& [folder, chip] : chips_)
+        if (!chip.folders.empty())
+            devices.emplace(chip.name, deviceOf(chip, interfaces));
     for (Sensor& sensor : sensors)
         if (const auto device = devices.find(sensor.chip); device != devices.end())
             sensor.device = device->second;
-    known_ = std::move(present);
+}
+
+void nameDevices(Sensors& sensors)
+{
+    try {
+        ChipDevices().nameIn(sensors, Vorn::Hwmon::presentMachine());
+    } catch (const std::system_error&) { // the chips cannot be listed
+    }
 }
 
 std::string otherChannels()

@@ -12,9 +12,12 @@
 
 #include <algorithm>
 #include <exception>
+#include <functional>
 #include <map>
+#include <memory>
 #include <string_view>
 #include <unordered_set>
+#include <utility>
 
 namespace Tools {
 
@@ -43,29 +46,39 @@ Sensors readSensors(const Host::Manager& manager)
     }
 }
 
-using Identifiers = std::unordered_set<std::string_view>;
+constexpr auto anyAge = Vorn::Hwmon::ChipList::Clock::duration::max();
 
-// Returns whether the source can be listed and the harvest has all its sensors. The provider
-// returns no error where a source cannot be read or breaks off.
-bool isUp(const Vorn::SourceEntry& entry, const Identifiers& harvested)
+using Chips = std::shared_ptr<const Vorn::Hwmon::Catalogue>;
+
+// Returns the present chips, without their features where libsensors is shared; null where they
+// cannot be listed.
+Chips listChips(Vorn::Hwmon::ChipList::Clock::duration ageOfAttributes)
 {
-    const auto isHarvested = [&](const Vorn::Node& node) {
-        return harvested.contains(deviceIdOf(node.description, node.path));
-    };
+    try {
+        if (isLibsensorsPrivate)
+            return Vorn::Hwmon::ChipList::instance().present(ageOfAttributes);
+        Vorn::Hwmon::Catalogue chips;
+        chips.machine = Vorn::Hwmon::presentMachine();
+        return std::make_shared<const Vorn::Hwmon::Catalogue>(std::move(chips));
+    } catch (const std::exception&) {
+        return nullptr; // the provider has logged the reason
+    }
+}
+
+using IsMissing = std::function<bool(const Vorn::Node&)>;
+
+// Returns whether the source can be listed and no node of it is missing.
+bool isUp(const Vorn::SourceEntry& entry, const Chips& chips, const IsMissing& isMissing)
+{
     try {
         const auto source = Vorn::openSource(entry);
-        if (entry.scheme == "hwmon" && !isLibsensorsPrivate) {
-            Vorn::Hwmon::presentMachine(); // throws where the chips cannot be listed
-            return true;
-        }
-        if (entry.scheme == "hwmon") { // the list of all types at once
-            const auto catalogue = Vorn::Hwmon::ChipList::instance().present();
-            return std::all_of(catalogue->features.begin(), catalogue->features.end(),
-                [&](const auto& feature) { return isHarvested(feature.node); });
-        }
+        if (entry.scheme == "hwmon") // the list of all types at once
+            return chips != nullptr &&
+                   std::none_of(chips->features.begin(), chips->features.end(),
+                       [&](const auto& feature) { return isMissing(feature.node); });
         for (const NodeType type : {NodeType::Temperature, NodeType::Voltage, NodeType::Tachometer})
             for (const Vorn::Node& node : source->nodes(type))
-                if (!isHarvested(node))
+                if (isMissing(node))
                     return false;
         return true;
     } catch (const std::exception&) {
@@ -73,18 +86,36 @@ bool isUp(const Vorn::SourceEntry& entry, const Identifiers& harvested)
     }
 }
 
-std::map<std::string, bool> statesOfSources(const Sensors& sensors)
+std::map<std::string, bool> statesOfSources(const Chips& chips, const IsMissing& isMissing)
 {
-    Identifiers harvested;
-    for (const Sensor& sensor : sensors)
-        harvested.insert(sensor.deviceId);
     std::map<std::string, bool> isUpByName;
     for (const Vorn::SourceEntry& entry : SourceOptions::sources()) {
         const std::string& name = entry.scheme == "hwmon" ? entry.scheme : entry.text;
         bool& areAllUp = isUpByName.try_emplace(name, true).first->second;
-        areAllUp = areAllUp && isUp(entry, harvested);
+        areAllUp = areAllUp && isUp(entry, chips, isMissing);
     }
     return isUpByName;
+}
+
+// Lists the sources once more, since the provider returns no error where one cannot be read or
+// breaks off. Where they have as many sensors as the harvest, none is missing, and identifiers need
+// not be compared.
+std::map<std::string, bool> statesOfSources(const Sensors& sensors, const Chips& chips)
+{
+    std::size_t count = 0;
+    auto states = statesOfSources(chips, [&](const Vorn::Node&) {
+        ++count;
+        return false;
+    });
+    if (count == sensors.size())
+        return states;
+    std::unordered_set<std::string_view> harvested;
+    for (const Sensor& sensor : sensors)
+        harvested.insert(sensor.deviceId);
+    return statesOfSources(
+        chips ? listChips(std::chrono::seconds(0)) : nullptr, [&](const Vorn::Node& node) {
+            return !harvested.contains(deviceIdOf(node.description, node.path));
+        });
 }
 
 } // namespace
@@ -102,9 +133,10 @@ Harvest readHarvest(const Host::Manager& manager, ChipDevices& devices)
 {
     const auto begin = std::chrono::steady_clock::now();
     Harvest harvest{readSensors(manager), {}};
-    if (SourceOptions::readsHwmon())
-        devices.nameIn(harvest.sensors);
-    harvest.sources = statesOfSources(harvest.sensors);
+    const Chips chips = SourceOptions::readsHwmon() ? listChips(anyAge) : nullptr;
+    if (chips)
+        devices.nameIn(harvest.sensors, chips->machine);
+    harvest.sources = statesOfSources(harvest.sensors, chips);
     harvest.duration = std::chrono::steady_clock::now() - begin;
     return harvest;
 }

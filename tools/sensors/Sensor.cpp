@@ -4,6 +4,7 @@
 
 #include "host/broker/Array.h"
 #include "host/broker/Instance.h"
+#include "host/broker/String.h"
 #include "platform/text/Escape.h"
 #include "platform/text/Utf8.h"
 #include "platform/utilities/ProviderUtilities.h"
@@ -12,6 +13,7 @@
 #include <algorithm>
 #include <cmath>
 #include <limits>
+#include <utility>
 #include <vector>
 
 namespace Tools {
@@ -39,38 +41,58 @@ std::optional<std::int64_t> integerOf(const Host::Value& value)
     return static_cast<std::int64_t>(*number);
 }
 
-std::string_view textIn(const Host::Instance& instance, std::string_view property)
-{
-    const Host::Value* const value = instance.property(property);
-    return value == nullptr ? std::string_view{} : value->text().value_or(std::string_view{});
-}
+// The properties of an instance. They are found fast when they are requested in the order in which
+// the provider sets them.
+class Properties {
+public:
+    explicit Properties(const Host::Instance& instance)
+        : instance_(instance), next_(instance.properties().begin())
+    {
+    }
 
-std::optional<std::int64_t> numberIn(const Host::Instance& instance, std::string_view property)
-{
-    const Host::Value* const value = instance.property(property);
-    return value == nullptr ? std::nullopt : integerOf(*value);
-}
+    // Returns a null value when there is no such property.
+    Host::Value operator[](std::string_view name)
+    {
+        for (auto each = next_; each != instance_.properties().end(); ++each)
+            if (*(*each).name->text() == name) {
+                const Host::Value& value = (*each).value;
+                next_ = ++each;
+                return value;
+            }
+        const Host::Value* const value = instance_.property(name);
+        return value == nullptr ? Host::Value() : *value;
+    }
 
-std::vector<unsigned> operationalStatusesOf(const Host::Instance& instance)
+    std::string_view text(std::string_view name) { return (*this)[name].text().value_or(""); }
+
+    std::optional<std::int64_t> number(std::string_view name) { return integerOf((*this)[name]); }
+
+private:
+    const Host::Instance& instance_;
+    decltype(std::declval<const Host::NamedValues&>().begin()) next_;
+};
+
+std::vector<unsigned> codesIn(const Host::Value& value)
 {
-    std::vector<unsigned> statuses;
-    const Host::Value* const value = instance.property("OperationalStatus");
-    if (const Host::Array* const array = value == nullptr ? nullptr : value->array())
+    std::vector<unsigned> codes;
+    if (const Host::Array* const array = value.array())
         for (const Host::Value& element : array->elements())
-            if (const auto status = element.unsignedInteger())
-                statuses.push_back(static_cast<unsigned>(*status));
-    return statuses;
+            if (const auto code = element.unsignedInteger())
+                codes.push_back(static_cast<unsigned>(*code));
+    return codes;
 }
 
 // Returns the words of the possible states that can be a CurrentState.
-std::vector<std::string_view> possibleStatesOf(const Host::Instance& instance)
+std::vector<std::string_view> possibleStatesIn(const Host::Value& value)
 {
     std::vector<std::string_view> words;
-    const Host::Value* const value = instance.property("PossibleStates");
-    if (const Host::Array* const array = value == nullptr ? nullptr : value->array())
-        for (const Host::Value& element : array->elements())
-            if (const auto word = wordOfState(element.text().value_or("")))
-                words.push_back(*word);
+    const Host::Array* const array = value.array();
+    if (array == nullptr)
+        return words;
+    words.reserve(array->elements().size());
+    for (const Host::Value& element : array->elements())
+        if (const auto word = wordOfState(element.text().value_or("")))
+            words.push_back(*word);
     return words;
 }
 
@@ -89,11 +111,9 @@ std::string_view kindOf(std::int64_t sensorType)
     }
 }
 
-std::optional<Quantity> quantityIn(
-    const Host::Instance& instance, std::string_view property, std::int32_t modifier)
+std::optional<Quantity> quantityOf(std::optional<std::int64_t> value, std::int32_t modifier)
 {
-    const auto value = numberIn(instance, property);
-    if (!value || value == unrepresentable)
+    if (!value || *value == unrepresentable)
         return std::nullopt;
     return Quantity{*value, modifier};
 }
@@ -117,27 +137,29 @@ std::string Quantity::rounded() const
     return scaledToHundredths(value, modifier);
 }
 
-Sensor::Sensor(const Host::Instance& from)
-    : kind(kindOf(numberIn(from, "SensorType").value_or(0))),
-      unit(unitSymbol(static_cast<std::uint64_t>(numberIn(from, "BaseUnits").value_or(0)))),
-      instance(&from)
+Sensor::Sensor(const Host::Instance& from) : instance(&from)
 {
-    identify(textIn(from, "ElementName"), textIn(from, "DeviceID"));
-    const std::vector<unsigned> statuses = operationalStatusesOf(from);
+    Properties properties(from);
+    const std::string_view id = properties.text("DeviceID");
+    identify(properties.text("ElementName"), id);
+    const std::string_view currentState = properties.text("CurrentState");
+    possibleStates = possibleStatesIn(properties["PossibleStates"]);
+    unit = unitSymbol(static_cast<std::uint64_t>(properties.number("BaseUnits").value_or(0)));
+    kind = kindOf(properties.number("SensorType").value_or(0));
+    const auto enabledState = properties.number("EnabledState");
+    health = static_cast<unsigned>(properties.number("HealthState").value_or(0));
+    const std::vector<unsigned> statuses = codesIn(properties["OperationalStatus"]);
+    state = stateOf(currentState, statuses);
     const auto has = [&](unsigned status) {
         return std::find(statuses.begin(), statuses.end(), status) != statuses.end();
     };
-    state = stateOf(textIn(from, "CurrentState"), statuses);
-    possibleStates = possibleStatesOf(from);
-    health = static_cast<unsigned>(numberIn(from, "HealthState").value_or(0));
-    const auto enabledState = numberIn(from, "EnabledState");
+    const auto current = properties.number("CurrentReading");
+    const auto modifier = static_cast<std::int32_t>(properties.number("UnitModifier").value_or(0));
     const bool isSilent = has(noContact) || enabledState == disabled || enabledState == offline;
-    const auto modifier = static_cast<std::int32_t>(numberIn(from, "UnitModifier").value_or(0));
-    reading = quantityIn(from, "CurrentReading", modifier);
-    if (reading && (has(lostCommunication) || (reading->value == 0 && isSilent)))
-        reading.reset();
-    for (std::size_t i = 0; i < limits.size(); ++i)
-        limits.at(i) = quantityIn(from, limitKinds.at(i).property, modifier);
+    if (!has(lostCommunication) && !(current == 0 && isSilent))
+        reading = quantityOf(current, modifier);
+    for (const std::size_t i : {0U, 3U, 1U, 4U, 2U, 5U})
+        limits.at(i) = quantityOf(properties.number(limitKinds.at(i).property), modifier);
 }
 
 std::string deviceIdOf(const std::string& description, std::string_view path)

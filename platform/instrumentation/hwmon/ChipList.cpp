@@ -24,8 +24,6 @@ namespace Vorn::Hwmon {
 
 namespace {
 
-constexpr auto attributesPeriod = std::chrono::seconds(2);
-
 // Throws std::system_error when the process lacks the descriptors with which chips are listed:
 // libsensors takes a file that it cannot open for one that is not there, so that its list would
 // have no chips, or labels would be missing.
@@ -52,11 +50,11 @@ ChipList::~ChipList()
     sensors_cleanup();
 }
 
-std::shared_ptr<const Catalogue> ChipList::present()
+std::shared_ptr<const Catalogue> ChipList::present(Clock::duration ageOfAttributes)
 {
     for (;;) {
         auto listed = known();
-        if (listed != nullptr && isPresent(*listed))
+        if (listed != nullptr && isPresent(*listed, ageOfAttributes))
             return listed;
         const std::unique_lock alone(mutex_);
         if (catalogue_ != listed) // another thread has renewed the list meanwhile
@@ -96,14 +94,13 @@ std::shared_ptr<const Catalogue> ChipList::known()
     return catalogue_;
 }
 
-// Lists the attributes of all chips every two seconds only, since that takes as long as a tenth of
-// their readings.
-bool ChipList::isPresent(const Catalogue& catalogue)
+// To list the attributes of all chips takes as long as a tenth of their readings.
+bool ChipList::isPresent(const Catalogue& catalogue, Clock::duration ageOfAttributes)
 {
     if (catalogue.machine != presentMachine())
         return false;
     const auto now = Clock::now();
-    if (now - attributesListed_.load() < attributesPeriod)
+    if (now - attributesListed_.load() <= ageOfAttributes)
         return true;
     if (catalogue.attributes != attributesFingerprint(catalogue.machine))
         return false;

@@ -27,13 +27,16 @@ namespace Vorn::Hwmon {
 // configuration has changed. Another user of libsensors in the process has a list of its own.
 class ChipList {
 public:
+    using Clock = std::chrono::steady_clock;
+
     // Returns the list of this process. libsensors is released when the library is unloaded.
     static ChipList& instance();
 
-    // Returns the catalogue of the chips that are present now. It has an attribute that a driver
-    // added to a chip that stays at the latest two seconds after that. Throws std::runtime_error
-    // with libsensors' reason.
-    std::shared_ptr<const Catalogue> present();
+    // Returns the catalogue of the chips that are present now. Where the attributes of the chips
+    // were listed longer ago than that age, they are listed again: a driver may have added some to
+    // a chip that stays. Throws std::runtime_error with libsensors' reason.
+    std::shared_ptr<const Catalogue> present(
+        Clock::duration ageOfAttributes = std::chrono::seconds(2));
 
     // Returns the value of the attribute, to which libsensors applies the `compute` line; nothing
     // when it cannot be read, or when the chip was removed.
@@ -45,12 +48,10 @@ public:
     ChipList& operator=(const ChipList&) = delete;
 
 private:
-    using Clock = std::chrono::steady_clock;
-
     ChipList() = default;
 
     std::shared_ptr<const Catalogue> known();
-    bool isPresent(const Catalogue& catalogue);
+    bool isPresent(const Catalogue& catalogue, Clock::duration ageOfAttributes);
     void renew();
     ComputeLines initialise(const SensorsConfiguration& configuration);
     void reportOnce(const std::vector<LibsensorsHooks::ParseError>& errors,
