@@ -2,7 +2,7 @@
 
 #include "platform/instrumentation/hwmon/Catalogue.h"
 
-#include "platform/instrumentation/hwmon/ComputeLines.h"
+#include "platform/instrumentation/hwmon/FeatureLines.h"
 #include "platform/text/Trim.h"
 #include "platform/text/Utf8.h"
 
@@ -15,6 +15,7 @@
 #include <array>
 #include <cstdlib>
 #include <memory>
+#include <set>
 #include <stdexcept>
 #include <utility>
 
@@ -61,8 +62,8 @@ std::optional<NodeType> nodeTypeOf(sensors_feature_type type)
     }
 }
 
-// Returns the administrator's or the driver's label, or the feature's name where there is none.
-std::string descriptionOf(const sensors_chip_name& chip, const sensors_feature& feature)
+// Returns the administrator's or the driver's label, or the feature's name where it is empty.
+std::string labelOf(const sensors_chip_name& chip, const sensors_feature& feature)
 {
     const std::unique_ptr<char, decltype(&std::free)> label(
         sensors_get_label(&chip, &feature), &std::free);
@@ -72,7 +73,7 @@ std::string descriptionOf(const sensors_chip_name& chip, const sensors_feature& 
 }
 
 std::vector<Attribute> attributesOf(const sensors_chip_name& chip, const sensors_feature& feature,
-    bool mayBeComputed, const std::vector<std::string>& enables)
+    bool mayBeComputed, const std::set<std::string>& unlisted)
 {
     std::vector<Attribute> attributes;
     int position = 0;
@@ -87,24 +88,28 @@ std::vector<Attribute> attributesOf(const sensors_chip_name& chip, const sensors
                 mayBeComputed && (found->flags & SENSORS_COMPUTE_MAPPING) != 0});
     }
     std::string enable = std::string(feature.name) + "_enable";
-    if (std::find(enables.begin(), enables.end(), enable) != enables.end())
+    if (unlisted.contains(enable))
         attributes.push_back({std::move(enable), &enableMeaning, false});
     return attributes;
 }
 
 // Returns the features of a chip without their place in the catalogue.
-std::vector<Feature> featuresOf(const NamedChip& chip, const ComputeLines& computeLines)
+std::vector<Feature> featuresOf(
+    const NamedChip& chip, const std::set<std::string>& unlisted, const FeatureLines& configuration)
 {
     const auto& [chipName, name] = chip;
-    const std::vector<std::string> enables = enableAttributes(name->path);
     std::vector<Feature> features;
     int position = 0;
     while (const sensors_feature* found = sensors_get_features(name, &position))
         if (const auto type = nodeTypeOf(found->type)) {
-            Node node{"/hwmon/" + chipName + "/" + found->name, descriptionOf(*name, *found),
-                static_cast<unsigned>(*type)};
-            features.push_back({found->name, *type, std::move(node), 0,
-                attributesOf(*name, *found, computeLines.mayApplyTo(*name, found->name), enables)});
+            const std::string feature = found->name;
+            // libsensors would look for the file of a label for each feature.
+            const bool hasLabel =
+                unlisted.contains(feature + "_label") || configuration.mayLabel(*name, feature);
+            Node node{"/hwmon/" + chipName + "/" + feature,
+                hasLabel ? labelOf(*name, *found) : feature, static_cast<unsigned>(*type)};
+            features.push_back({feature, *type, std::move(node), 0,
+                attributesOf(*name, *found, configuration.mayCompute(*name, feature), unlisted)});
         }
     return features;
 }
@@ -120,7 +125,7 @@ Descriptor Chip::openFolder() const
     return opened;
 }
 
-Catalogue makeCatalogue(const ComputeLines& computeLines)
+Catalogue makeCatalogue(const AttributeNames& attributes, const FeatureLines& configuration)
 {
     Catalogue catalogue;
     for (const NamedChip& detected : detectedChips()) {
@@ -130,7 +135,10 @@ Catalogue makeCatalogue(const ComputeLines& computeLines)
             continue;
         Chip chip{path, *id, Descriptor()};
         chip.folder = chip.openFolder();
-        std::vector<Feature> features = featuresOf(detected, computeLines);
+        const auto listed = attributes.unlisted.find(*id);
+        std::vector<Feature> features = featuresOf(detected,
+            listed != attributes.unlisted.end() ? listed->second : unlistedAttributes(path),
+            configuration);
         // A chip that disappeared while its features were listed is left out, since the labels,
         // which name the sensors, may be incomplete.
         if (features.empty() || id != folderId(path))

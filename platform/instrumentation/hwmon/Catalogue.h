@@ -17,7 +17,7 @@
 
 namespace Vorn::Hwmon {
 
-class ComputeLines;
+class FeatureLines;
 
 struct Chip {
     std::string path; // of the folder with its attributes
@@ -52,7 +52,7 @@ struct Catalogue {
 
 // Returns the chips and features that libsensors lists and the administrator does not ignore.
 // Throws std::runtime_error naming the chip whose folder cannot be opened. REQUIRES: a lock of
-// ChipList is held.
-Catalogue makeCatalogue(const ComputeLines& computeLines);
+// ChipList is held, and libsensors has listed the chips after the attributes were listed.
+Catalogue makeCatalogue(const AttributeNames& attributes, const FeatureLines& configuration);
 
 } // namespace Vorn::Hwmon

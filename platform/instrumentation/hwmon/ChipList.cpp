@@ -102,7 +102,7 @@ bool ChipList::isPresent(const Catalogue& catalogue, Clock::duration ageOfAttrib
     const auto now = Clock::now();
     if (now - attributesListed_.load() <= ageOfAttributes)
         return true;
-    if (catalogue.attributes != attributesFingerprint(catalogue.machine))
+    if (catalogue.attributes != attributeNames(catalogue.machine).fingerprint)
         return false;
     attributesListed_ = now;
     return true;
@@ -120,13 +120,14 @@ void ChipList::renew()
         // others makes a difference to it, and a later call lists them again.
         const auto now = Clock::now();
         Machine machine = presentMachine();
-        const std::size_t attributes = attributesFingerprint(machine);
+        const AttributeNames attributes = attributeNames(machine);
         try {
             Catalogue catalogue =
-                machine.hasHwmon ? makeCatalogue(initialise(SensorsConfiguration())) : Catalogue();
+                machine.hasHwmon ? makeCatalogue(attributes, initialise(SensorsConfiguration()))
+                                 : Catalogue();
             requireDescriptors();
             catalogue.machine = std::move(machine);
-            catalogue.attributes = attributes;
+            catalogue.attributes = attributes.fingerprint;
             catalogue_ = std::make_shared<const Catalogue>(std::move(catalogue));
             attributesListed_ = now;
             return;
@@ -138,7 +139,7 @@ void ChipList::renew()
 }
 
 // Makes libsensors list the chips, with the configuration applied to them.
-ComputeLines ChipList::initialise(const SensorsConfiguration& configuration)
+FeatureLines ChipList::initialise(const SensorsConfiguration& configuration)
 {
     std::string text = configuration.text();
     const std::unique_ptr<FILE, decltype(&fclose)> file(

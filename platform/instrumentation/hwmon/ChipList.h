@@ -5,7 +5,7 @@
 #pragma once
 
 #include "platform/instrumentation/hwmon/Catalogue.h"
-#include "platform/instrumentation/hwmon/ComputeLines.h"
+#include "platform/instrumentation/hwmon/FeatureLines.h"
 #include "platform/instrumentation/hwmon/LibsensorsHooks.h"
 #include "platform/instrumentation/hwmon/SensorsConfiguration.h"
 
@@ -53,7 +53,7 @@ private:
     std::shared_ptr<const Catalogue> known();
     bool isPresent(const Catalogue& catalogue, Clock::duration ageOfAttributes);
     void renew();
-    ComputeLines initialise(const SensorsConfiguration& configuration);
+    FeatureLines initialise(const SensorsConfiguration& configuration);
     void reportOnce(const std::vector<LibsensorsHooks::ParseError>& errors,
         const SensorsConfiguration& configuration);
 

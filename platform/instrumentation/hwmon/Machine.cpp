@@ -13,6 +13,7 @@
 #include <memory>
 #include <string_view>
 #include <system_error>
+#include <utility>
 
 namespace Vorn::Hwmon {
 
@@ -36,6 +37,11 @@ bool visitEntries(const std::string& path, const Visitor& visit)
         if (entry->d_name[0] != '.')
             visit(dirfd(folder.get()), entry->d_name);
     return true;
+}
+
+bool isUnlisted(std::string_view attribute)
+{
+    return attribute.ends_with("_enable") || attribute.ends_with("_label");
 }
 
 // Relative paths begin at the folder.
@@ -69,33 +75,38 @@ Machine presentMachine()
     return machine;
 }
 
-std::vector<std::string> enableAttributes(const std::string& chipFolder)
+AttributeNames attributeNames(const Machine& machine)
 {
-    std::vector<std::string> names;
-    visitEntries(chipFolder, [&](int, std::string_view name) {
-        if (name.ends_with("_enable"))
-            names.emplace_back(name);
-    });
-    return names;
-}
-
-std::size_t attributesFingerprint(const Machine& machine)
-{
-    std::size_t sum = 0;
+    AttributeNames attributes;
     for (const auto& [chip, id] : machine.chips) {
         std::size_t names = 0;
         bool isNamed = false;
+        std::set<std::string> unlisted;
         const auto add = [&](int, std::string_view name) {
             names += std::hash<std::string_view>{}(name);
             isNamed = isNamed || name == "name";
+            if (isUnlisted(name))
+                unlisted.emplace(name);
         };
         const std::string folder = std::string(hwmonFolder) + "/" + chip;
         visitEntries(folder, add);
-        if (!isNamed) // old drivers have name and attributes in the folder of the device
+        if (isNamed)
+            attributes.unlisted.emplace(id, std::move(unlisted));
+        else // old drivers have name and attributes in the folder of the device
             visitEntries(folder + "/device", add);
-        sum = sum * 31 + names;
+        attributes.fingerprint = attributes.fingerprint * 31 + names;
     }
-    return sum;
+    return attributes;
+}
+
+std::set<std::string> unlistedAttributes(const std::string& chipFolder)
+{
+    std::set<std::string> names;
+    visitEntries(chipFolder, [&](int, std::string_view name) {
+        if (isUnlisted(name))
+            names.emplace(name);
+    });
+    return names;
 }
 
 } // namespace Vorn::Hwmon

@@ -7,7 +7,9 @@
 #include "platform/instrumentation/FileStamp.h"
 
 #include <cstddef>
+#include <map>
 #include <optional>
+#include <set>
 #include <string>
 #include <utility>
 #include <vector>
@@ -37,11 +39,19 @@ struct Machine {
 // chips cannot be listed.
 Machine presentMachine();
 
-// Returns the names that end in "_enable" in the folder of a chip: libsensors does not list them.
-std::vector<std::string> enableAttributes(const std::string& chipFolder);
+// The names of the attributes of the chips at one time.
+struct AttributeNames {
+    std::size_t fingerprint = 0; // changes with them: drivers may add some to a registered chip
+    // The result of unlistedAttributes() for the folders of chips; not for those of their devices,
+    // which have the attributes of old drivers.
+    std::map<FolderId, std::set<std::string>> unlisted;
+};
 
-// Returns a number that changes with the names of the attributes of the chips: drivers may add and
-// remove attributes of a registered chip. Lists the folder of each chip, or that of its device.
-std::size_t attributesFingerprint(const Machine& machine);
+// Lists the folder of each chip, or that of its device.
+AttributeNames attributeNames(const Machine& machine);
+
+// Returns those names of attributes in the folder of a chip that libsensors does not list: they end
+// in "_enable" or "_label".
+std::set<std::string> unlistedAttributes(const std::string& chipFolder);
 
 } // namespace Vorn::Hwmon

@@ -8,6 +8,10 @@
 
 #include <gmock/gmock.h>
 
+#include <fcntl.h>
+#include <unistd.h>
+
+#include <cerrno>
 #include <set>
 
 namespace HwmonOracleTests {
@@ -97,6 +101,28 @@ TEST_F(HwmonOracleTest, AWirelessCardThatSleepsHasNoReading)
         (NodeReading{.status = 13, .baseUnits = 2, .possibleStates = {{1}}}));
 }
 
+TEST_F(HwmonOracleTest, AttributesOfAnOldDriverAreInTheFolderOfItsDevice)
+{
+    BoundSysfs sysfs("");
+    sysfs.addChip("hwmon0", "board", "platform", "board.656");
+    sysfs.rename("hwmon/hwmon0/name", "hwmon/hwmon0/device/name");
+    for (const auto& [file, content] :
+        {std::pair("temp1_input", "20000\n"), {"temp1_label", "Inlet\n"}, {"temp1_enable", "0\n"}})
+        sysfs.write(std::string("hwmon/hwmon0/device/") + file, content);
+    EXPECT_EQ(compareWithSensors(), 1U);
+    EXPECT_EQ(Testing::walk().front().description, "Inlet");
+}
+
+// libsensors is not told what nobody may read (LibsensorsHooks.cpp).
+TEST_F(HwmonOracleTest, TheKernelOpensNoAttributeThatNobodyMayRead)
+{
+    constexpr const char* writable = "/sys/bus/platform/drivers_probe";
+    if (::access(writable, F_OK) != 0)
+        GTEST_SKIP() << "there is no " << writable;
+    EXPECT_EQ(::open(writable, O_RDONLY | O_CLOEXEC), -1);
+    EXPECT_EQ(errno, EACCES);
+}
+
 // A configuration, and the features that libsensors computes on the machine below.
 struct Shape {
     const char* name;
@@ -160,6 +186,10 @@ const std::set<std::string> everything = [] {
 
 const Shape shapes[] = {
     {"computesNothing", "chip \"board-*\"\n  label in0 \"Core\"\n  ignore temp2\n", {}},
+    {"labelsEveryChip", "chip \"*-*\"\n  label in1 \"Rail\"\n", {}},
+    {"labelsOneAddress", "chip \"board-isa-0290\"\n  label \"temp1\" \"Outlet\"\n", {}},
+    {"labelsABusByItsAdapter",
+        "bus \"i2c-0\" \"Adapter 3\"\nchip \"lm75-i2c-0-48\"\n  label temp1 \"Inlet\"\n", {}},
     {"computesOneFeature", "chip \"board-*\"\n  compute in0 @*2, @/2\n", {"board-isa-0290/in0"}},
     {"computesOnEveryChip", "chip \"*-*\"\n  compute fan1 @/2, @*2\n",
         {"board-isa-0290/fan1", "lm75-i2c-1-48/fan1", "lm75-i2c-3-48/fan1"}},

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-#include "platform/instrumentation/hwmon/ComputeLines.h"
+#include "platform/instrumentation/hwmon/FeatureLines.h"
 
 #include <algorithm>
 #include <cctype>
@@ -61,7 +61,7 @@ std::vector<std::string_view> removeStatement(std::string_view& text)
 
 } // namespace
 
-ComputeLines::ComputeLines(std::string_view configuration, bool hasErrors) : isUnclear_(hasErrors)
+FeatureLines::FeatureLines(std::string_view configuration, bool hasErrors) : isUnclear_(hasErrors)
 {
     Chips chips; // which the last `chip` line matches
     while (!configuration.empty() && !isUnclear_) {
@@ -72,21 +72,22 @@ ComputeLines::ComputeLines(std::string_view configuration, bool hasErrors) : isU
             chips.clear();
             for (auto token = std::next(statement.begin()); token != statement.end(); ++token)
                 chips.merge(chipsOf(*token));
-        } else if (statement[0] == "compute") {
+        } else if (statement[0] == "compute" || statement[0] == "label") {
+            Features& features = statement[0] == "label" ? labelled_ : computed_;
             for (const sensors_chip_name* const chip : chips)
-                features_[chip].insert(nameOf(statement[1]));
+                features[chip].insert(nameOf(statement[1]));
         }
     }
 }
 
-std::string ComputeLines::nameOf(std::string_view token)
+std::string FeatureLines::nameOf(std::string_view token)
 {
     if (token.find('\\') != std::string_view::npos) // the escapes of C are not decoded
         isUnclear_ = true;
     return std::string(token.starts_with('"') ? token.substr(1, token.size() - 2) : token);
 }
 
-ComputeLines::Chips ComputeLines::chipsOf(std::string_view token)
+FeatureLines::Chips FeatureLines::chipsOf(std::string_view token)
 {
     Chips chips;
     sensors_chip_name pattern{};
@@ -104,10 +105,21 @@ ComputeLines::Chips ComputeLines::chipsOf(std::string_view token)
     return chips;
 }
 
-bool ComputeLines::mayApplyTo(const sensors_chip_name& chip, const std::string& feature) const
+bool FeatureLines::mayCompute(const sensors_chip_name& chip, const std::string& feature) const
 {
-    const auto found = features_.find(&chip);
-    return isUnclear_ || (found != features_.end() && found->second.contains(feature));
+    return isNamedIn(computed_, chip, feature);
+}
+
+bool FeatureLines::mayLabel(const sensors_chip_name& chip, const std::string& feature) const
+{
+    return isNamedIn(labelled_, chip, feature);
+}
+
+bool FeatureLines::isNamedIn(
+    const Features& features, const sensors_chip_name& chip, const std::string& feature) const
+{
+    const auto found = features.find(&chip);
+    return isUnclear_ || (found != features.end() && found->second.contains(feature));
 }
 
 } // namespace Vorn::Hwmon
