@@ -103,12 +103,12 @@ std::map<std::string, bool> statesOfSources(const Chips& chips, const IsMissing&
 std::map<std::string, bool> statesOfSources(const Sensors& sensors, const Chips& chips)
 {
     std::size_t count = 0;
-    auto states = statesOfSources(chips, [&](const Vorn::Node&) {
+    auto isUpBySource = statesOfSources(chips, [&](const Vorn::Node&) {
         ++count;
         return false;
     });
     if (count == sensors.size())
-        return states;
+        return isUpBySource;
     std::unordered_set<std::string_view> harvested;
     for (const Sensor& sensor : sensors)
         harvested.insert(sensor.deviceId);
