@@ -1,24 +1,39 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Measures requests in sensorctl serve, OpenPegasus and sfcb, in turn: each has one client on a
-// connection that stays open, the same providers and the same model file. Prints a table.
+// Measures requests in sensorctl serve, OpenPegasus and sfcb: each has one client on a connection
+// that stays open, the same providers and the same model file. Prints a table.
 //
-//     bench_peers [rounds]
+//     bench_peers [blocks]
+//
+// They take turns in blocks of twenty requests, the first of which is not counted: a client that
+// repeats requests finds the caches of the processor as its last request left them, and with turns
+// of single requests each server would find them as another one left them. Two more rows show what
+// none of them can save: the provider's call by itself, and the transport of the same answer.
 
+#include "bench/AnswerRepeater.h"
 #include "bench/Median.h"
 #include "bench/ModelMachine.h"
 #include "bench/ServerProcess.h"
 #include "bench/Skim.h"
+#include "host/broker/Broker.h"
+#include "host/broker/CollectedResult.h"
+#include "host/broker/ObjectPath.h"
+#include "host/broker/Request.h"
+#include "host/broker/Result.h"
+#include "platform/logging/LogSettings.h"
 #include "platform/utilities/ProviderUtilities.h"
 #include "tests/objectmanagers/InstalledManager.h"
+#include "tests/providers/Factories.h"
 #include "tests/support/CimCall.h"
 #include "tests/support/HttpClient.h"
 #include "tests/support/Texts.h"
+#include "tools/serve/FreedMemory.h"
 
 #include <chrono>
 #include <cstdio>
 #include <cstdlib>
 #include <exception>
+#include <functional>
 #include <stdexcept>
 #include <string>
 #include <utility>
@@ -51,33 +66,63 @@ public:
     }
 
     // sfcb closes a connection after 10 requests: the request is sent once more on a new one then.
-    void measure(const std::string& request)
+    void ask(const std::string& request)
     {
-        if (!trySend(request)) {
+        if (!tryAsk(request)) {
             client_ = HttpClient(port_);
-            if (!trySend(request))
+            if (!tryAsk(request))
                 throw std::runtime_error(name_ + " closes each connection");
         }
     }
 
-    // Returns the median in milliseconds of what was measured since the last call.
-    double median() { return Bench::median(std::exchange(durations_, {})); }
-
 private:
     // Returns false where the server has closed the connection.
-    bool trySend(const std::string& request)
+    bool tryAsk(const std::string& request)
     {
-        const auto begin = Clock::now();
-        if (!client_.trySend(request) || Bench::skim(client_) == 0)
-            return false;
-        durations_.push_back(Milliseconds(Clock::now() - begin).count());
-        return true;
+        return client_.trySend(request) && Bench::skim(client_) != 0;
     }
 
     std::string name_;
     std::uint16_t port_;
     HttpClient client_;
-    std::vector<double> durations_;
+};
+
+// The provider without a server: its functions are called in a request of the embedded broker.
+class ProviderAlone {
+public:
+    void getInstance(const char** properties) const
+    {
+        call([=, this](auto& context, auto& result, auto& path) {
+            path.addKey("DeviceID", Host::Value::text(Host::Arena::required(),
+                                        Bench::ModelMachine::someDeviceID(sensors)));
+            return mi_->ft->getInstance(
+                mi_, context.handle(), result.handle(), path.handle(), properties);
+        });
+    }
+
+    void enumerateInstances(const char** properties) const
+    {
+        call([=, this](auto& context, auto& result, auto& path) {
+            return mi_->ft->enumerateInstances(
+                mi_, context.handle(), result.handle(), path.handle(), properties);
+        });
+    }
+
+private:
+    template <typename Function>
+    void call(const Function& function) const
+    {
+        Host::Request request(broker_);
+        Host::CollectedResult answer;
+        Host::Result result(answer);
+        function(request.context(), result, request.makePath("root/cimv2", className));
+        if (answer.isEmpty())
+            throw std::runtime_error("the provider does not answer");
+    }
+
+    const Host::Broker broker_;
+    CMPIInstanceMI* const mi_ =
+        SensorProfileProvider_Create_InstanceMI(broker_.handle(), nullptr, nullptr);
 };
 
 std::string getInstance(const std::string& moreParameters = {})
@@ -98,47 +143,86 @@ std::string enumerateInstances(const std::string& moreParameters = {})
         "EnumerateInstances", Testing::cimClassParameter(className) + moreParameters);
 }
 
-// Returns the parameter with a list of all properties that an instance in the answer has.
-std::string propertyList(const std::string& answer)
+// Returns the names of all properties that an instance in the answer has.
+std::vector<std::string> propertiesIn(const std::string& answer)
 {
-    std::string values;
+    std::vector<std::string> names;
     const std::string instance = answer.substr(0, answer.find("</INSTANCE>"));
     constexpr std::string_view start = "<PROPERTY";
     for (auto at = instance.find(start); at != std::string::npos;
          at = instance.find(start, at + 1)) {
         const auto name = instance.find("NAME=\"", at) + 6;
-        values += "<VALUE>" + instance.substr(name, instance.find('"', name) - name) + "</VALUE>";
+        names.push_back(instance.substr(name, instance.find('"', name) - name));
     }
+    return names;
+}
+
+std::string propertyList(const std::vector<std::string>& names)
+{
+    std::string values;
+    for (const std::string& name : names)
+        values += "<VALUE>" + name + "</VALUE>";
     return Testing::cimParameter("PropertyList", "<VALUE.ARRAY>" + values + "</VALUE.ARRAY>");
+}
+
+// Does the work of one line of the table.
+struct Contestant {
+    std::string name;
+    std::size_t properties; // in an instance of the answer
+    std::function<void()> ask;
+    std::vector<double> milliseconds = {};
+};
+
+void takeTurns(std::vector<Contestant>& contestants, int blocks)
+{
+    constexpr int requests = 20; // in a block
+    for (int block = 0; block < blocks; ++block)
+        for (Contestant& each : contestants) {
+            each.ask();
+            for (int counted = 1; counted < requests; ++counted) {
+                const auto begin = Clock::now();
+                each.ask();
+                each.milliseconds.push_back(Milliseconds(Clock::now() - begin).count());
+            }
+        }
 }
 
 struct Row {
     const char* label;
     std::string request;
     std::size_t instances;
+    std::function<void()> callProvider;
 };
 
-void print(const Row& row, std::vector<Peer>& peers, int rounds)
+void print(const Row& row, std::vector<Peer>& peers, int blocks)
 {
-    std::vector<std::size_t> properties;
+    std::vector<Contestant> contestants;
+    std::string ownAnswer;
     for (Peer& peer : peers) {
         const std::string body = peer.bodyOf(row.request);
         if (Testing::countOf(body, "<INSTANCE ") != row.instances)
             throw std::runtime_error(peer.name() + " answers " + body.substr(0, 500));
-        properties.push_back(Testing::countOf(body, "<PROPERTY") / row.instances);
+        contestants.push_back({peer.name(), Testing::countOf(body, "<PROPERTY") / row.instances,
+            [&] { peer.ask(row.request); }});
+        if (&peer == &peers.front())
+            ownAnswer = body;
     }
-    for (int round = 0; round < rounds; ++round)
-        for (Peer& peer : peers)
-            peer.measure(row.request);
-    const double own = peers.front().median();
-    for (Peer& peer : peers) {
-        const double median = &peer == &peers.front() ? own : peer.median();
-        std::printf("| %s | %s | %zu | %.2f | %.2f |\n", row.label, peer.name().c_str(),
-            properties[static_cast<std::size_t>(&peer - peers.data())], median, median / own);
+    const std::size_t properties = contestants.front().properties;
+    contestants.push_back({"the provider's call alone", properties, row.callProvider});
+    const Bench::AnswerRepeater repeater(row.request.size(), ownAnswer);
+    Peer transport("the same bytes", repeater.port());
+    contestants.push_back(
+        {"the same bytes alone", properties, [&] { transport.ask(row.request); }});
+    takeTurns(contestants, blocks);
+    const double own = Bench::median(contestants.front().milliseconds);
+    for (const Contestant& each : contestants) {
+        const double median = Bench::median(each.milliseconds);
+        std::printf("| %s | %s | %zu | %.2f | %.2f |\n", row.label, each.name.c_str(),
+            each.properties, median, median / own);
     }
 }
 
-void printTable(int rounds)
+void printTable(int blocks)
 {
     const Bench::ModelMachine machine(sensors);
     const Bench::ServerProcess server;
@@ -152,14 +236,24 @@ void printTable(int rounds)
         peers.emplace_back(manager->name(), static_cast<std::uint16_t>(manager->port()));
     }
     // sensorctl serve leaves out what is not set: with this list, the answers have equal content.
-    const std::string set = propertyList(peers.front().bodyOf(getInstance()));
+    const std::vector<std::string> names = propertiesIn(peers.front().bodyOf(getInstance()));
+    const std::string list = propertyList(names);
+    std::vector<const char*> listed;
+    for (const std::string& name : names)
+        listed.push_back(name.c_str());
+    listed.push_back(nullptr);
+    const ProviderAlone alone;
     std::puts("| request | server | properties | ms | times sensorctl serve |\n"
               "|---|---|---|---|---|");
-    for (const Row& row : {Row{"GetInstance", getInstance(), 1},
-             Row{"GetInstance, properties listed", getInstance(set), 1},
-             Row{"EnumerateInstances", enumerateInstances(), sensors},
-             Row{"EnumerateInstances, properties listed", enumerateInstances(set), sensors}})
-        print(row, peers, rounds);
+    for (const Row& row :
+        {Row{"GetInstance", getInstance(), 1, [&] { alone.getInstance(nullptr); }},
+            Row{"GetInstance, properties listed", getInstance(list), 1,
+                [&] { alone.getInstance(listed.data()); }},
+            Row{"EnumerateInstances", enumerateInstances(), sensors,
+                [&] { alone.enumerateInstances(nullptr); }},
+            Row{"EnumerateInstances, properties listed", enumerateInstances(list), sensors,
+                [&] { alone.enumerateInstances(listed.data()); }}})
+        print(row, peers, blocks);
     for (const InstalledManager* const manager : managers)
         manager->stop();
 }
@@ -169,10 +263,12 @@ void printTable(int rounds)
 int main(int argc, char** argv)
 {
     try {
-        const int rounds = argc > 1 ? std::atoi(argv[1]) : 100;
-        if (rounds <= 0)
-            throw std::runtime_error("the number of rounds is not positive");
-        printTable(rounds);
+        const int blocks = argc > 1 ? std::atoi(argv[1]) : 5;
+        if (blocks <= 0)
+            throw std::runtime_error("the number of blocks is not positive");
+        RynLog::configure({6000, "off", "off"});
+        Tools::keepFreedMemory(4); // as in the server
+        printTable(blocks);
         return 0;
     } catch (const std::exception& error) {
         std::fprintf(stderr, "bench_peers: %s\n", error.what());
