@@ -45,7 +45,7 @@ std::vector<std::uint16_t> repeatedThresholdCodes(unsigned times)
 
 std::string Sensor::getDeviceID() const
 {
-    return stripSpaces(deviceID_);
+    return std::string(deviceID());
 }
 
 std::string Sensor::getElementName() const
@@ -150,7 +150,7 @@ bool Sensor::setOperationalStatus(unsigned nodeStatus)
     return true;
 }
 
-bool Sensor::setPossibleStates(std::vector<unsigned> nodeStatuses)
+bool Sensor::setPossibleStates(const std::vector<unsigned>& nodeStatuses)
 {
     constexpr unsigned unknown = 0; // also stands for codes too large to store
     constexpr unsigned largest = std::numeric_limits<Codes::value_type>::max();

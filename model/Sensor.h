@@ -2,8 +2,11 @@
 
 #pragma once
 
+#include "platform/text/Trim.h"
+
 #include <cstdint>
 #include <string>
+#include <string_view>
 #include <vector>
 
 namespace Vorn::SensorProfileProvider {
@@ -22,6 +25,9 @@ namespace Vorn::SensorProfileProvider {
 class Sensor {
 public:
     Sensor() = default;
+
+    // The identifier as getDeviceID() returns it, valid until the record changes.
+    std::string_view deviceID() const { return Text::trimmed(deviceID_, " \t"); }
 
     std::string getDeviceID() const;    // without leading and trailing blanks
     std::string getElementName() const; // without leading and trailing blanks
@@ -61,8 +67,8 @@ public:
     bool setRequestedState(unsigned code);
     bool setHealthState(unsigned nodeStatus); // also the health status
     bool setCurrentState(unsigned nodeStatus);
-    bool setOperationalStatus(unsigned nodeStatus);             // appends
-    bool setPossibleStates(std::vector<unsigned> nodeStatuses); // replaces
+    bool setOperationalStatus(unsigned nodeStatus);                    // appends
+    bool setPossibleStates(const std::vector<unsigned>& nodeStatuses); // replaces
     bool setCurrentReading(double value);
     bool setLowerThresholdNonCritical(double value);
     bool setUpperThresholdNonCritical(double value);

@@ -64,9 +64,12 @@ void require(bool accepted, const char* refusal)
 void setIdentity(Sensor& sensor, const Instrumentation& node)
 {
     const std::string path = node.convertPathToString(node.getPathToNode());
-    const std::string description = node.getNodeDescription();
-    require(sensor.setDeviceID(description + ":" + path), "Failed while setting Device ID");
-    require(sensor.setElementName(description), "Failed while setting Element Name");
+    std::string description = node.getNodeDescription();
+    std::string deviceID;
+    deviceID.reserve(description.size() + 1 + path.size());
+    deviceID.append(description).append(1, ':').append(path);
+    require(sensor.setDeviceID(std::move(deviceID)), "Failed while setting Device ID");
+    require(sensor.setElementName(std::move(description)), "Failed while setting Element Name");
     require(sensor.setSensorType(node.getSensorType()), "Failed while setting Sensor Type");
 }
 

@@ -12,6 +12,7 @@
 #include <cstdlib>
 #include <exception>
 #include <optional>
+#include <span>
 #include <utility>
 
 namespace Vorn {
@@ -79,15 +80,15 @@ struct Instrumentation::State {
     struct OpenSource {
         std::string entry;
         std::unique_ptr<Source> source;
-        std::vector<Node> nodes; // of the selected type
+        std::span<const Node> nodes; // of the selected type
     };
 
     std::vector<OpenSource> sources;
     std::exception_ptr openFailure; // of the first source that could not be opened
     NodeType type{};
-    std::size_t place = 0;              // the source of the node under the cursor
-    std::size_t index = 0;              // the node's index among those of its source
-    std::optional<NodeReading> reading; // of the node under the cursor, once it was read
+    std::size_t place = 0;                // the source of the node under the cursor
+    std::size_t index = 0;                // the node's index among those of its source
+    const NodeReading* reading = nullptr; // of the node under the cursor, once it was read
 
     State();
     void select(NodeType selected);
@@ -95,7 +96,7 @@ struct Instrumentation::State {
     void passFinishedSources();
     static bool haveNodes(const std::vector<OpenSource*>& listed);
     bool isOnNode() const { return place < sources.size(); }
-    const Node& node() const { return sources.at(place).nodes.at(index); }
+    const Node& node() const { return sources.at(place).nodes[index]; }
     const NodeReading& visit();
 };
 
@@ -122,15 +123,15 @@ Instrumentation::State::State()
 void Instrumentation::State::select(NodeType selected)
 {
     place = sources.size(); // stays past the last node where a source fails
-    reading.reset();
+    reading = nullptr;
     type = selected;
     std::exception_ptr failure = openFailure;
     std::vector<OpenSource*> listed;
     for (OpenSource& open : sources) {
-        open.nodes.clear();
+        open.nodes = {};
         try {
-            open.nodes = attempt(open.entry, {SourceStep::Stage::Listing, selected},
-                [&] { return open.source->nodes(selected); });
+            open.nodes = *attempt(open.entry, {SourceStep::Stage::Listing, selected},
+                [&] { return &open.source->nodes(selected); });
             listed.push_back(&open);
         } catch (const std::exception&) {
             if (!failure)
@@ -162,7 +163,7 @@ bool Instrumentation::State::haveNodes(const std::vector<OpenSource*>& listed)
 
 void Instrumentation::State::advance()
 {
-    reading.reset();
+    reading = nullptr;
     ++index;
     passFinishedSources();
 }
@@ -176,12 +177,13 @@ void Instrumentation::State::passFinishedSources()
 
 const NodeReading& Instrumentation::State::visit()
 {
-    if (reading)
+    if (reading != nullptr)
         return *reading;
     const Node& visited = node();
-    OpenSource& open = sources[place];
+    const OpenSource& open = sources[place];
     try {
-        return reading.emplace(open.source->read(visited));
+        reading = &open.source->read(visited);
+        return *reading;
     } catch (const std::exception& error) {
         FailureLog::instance().failed(open.entry, {SourceStep::Stage::Reading, type}, error.what());
         throw;

@@ -44,13 +44,13 @@ class Source {
 public:
     virtual ~Source() = default;
 
-    // Returns the nodes of one type, in the source's own order.
+    // Returns the nodes of one type, in the source's own order. They live until the next call.
     // Throws std::runtime_error naming the file, line or chip when it cannot be used.
-    virtual std::vector<Node> nodes(NodeLexicon::NodeType type) = 0;
+    virtual const std::vector<Node>& nodes(NodeLexicon::NodeType type) = 0;
 
     // Reads a node that the last call of nodes() returned. A value that cannot be read now is
-    // absent, never an earlier one.
-    virtual NodeReading read(const Node& node) = 0;
+    // absent, never an earlier one. The reading lives until the next call of either function.
+    virtual const NodeReading& read(const Node& node) = 0;
 };
 
 } // namespace Vorn

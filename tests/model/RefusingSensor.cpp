@@ -60,7 +60,7 @@ bool Sensor::setRequestedState(unsigned code)
 {
     return accepts(code == 1 ? "setRequestedState" : "setRequestedState of another code");
 }
-bool Sensor::setPossibleStates(std::vector<unsigned>)
+bool Sensor::setPossibleStates(const std::vector<unsigned>&)
 {
     return accepts("setPossibleStates");
 }

@@ -56,21 +56,21 @@ private:
         {
         }
 
-        std::vector<Vorn::Node> nodes(Vorn::NodeLexicon::NodeType type) override
+        const std::vector<Vorn::Node>& nodes(Vorn::NodeLexicon::NodeType type) override
         {
             if (script_->selectionFails.contains(type))
                 throw std::runtime_error("scripted: selection");
-            std::vector<Vorn::Node> found;
+            nodes_.clear();
             for (std::size_t i = 0; i < script_->nodes.size(); ++i) {
                 const ScriptedNode& node = script_->nodes[i];
                 if (node.type == type)
-                    found.push_back({node.path, node.description,
+                    nodes_.push_back({node.path, node.description,
                         node.sensorType.value_or(static_cast<unsigned>(type)), i});
             }
-            return found;
+            return nodes_;
         }
 
-        Vorn::NodeReading read(const Vorn::Node& node) override
+        const Vorn::NodeReading& read(const Vorn::Node& node) override
         {
             const ScriptedNode& scripted = script_->nodes.at(node.token);
             if (scripted.failsWhenRead)
@@ -80,6 +80,7 @@ private:
 
     private:
         std::shared_ptr<const Script> script_;
+        std::vector<Vorn::Node> nodes_;
     };
 
     std::shared_ptr<Script> script_;

@@ -55,19 +55,22 @@ private:
         WatchedSource(const WatchedSource&) = delete;
         WatchedSource& operator=(const WatchedSource&) = delete;
 
-        std::vector<Vorn::Node> nodes(Vorn::NodeLexicon::NodeType type) override
+        const std::vector<Vorn::Node>& nodes(Vorn::NodeLexicon::NodeType type) override
         {
-            return {{"/node", "node", static_cast<unsigned>(type), 0}};
+            nodes_ = {{"/node", "node", static_cast<unsigned>(type), 0}};
+            return nodes_;
         }
 
-        Vorn::NodeReading read(const Vorn::Node&) override
+        const Vorn::NodeReading& read(const Vorn::Node&) override
         {
             watch_->whenRead();
-            return {};
+            return reading_;
         }
 
     private:
         std::shared_ptr<Watch> watch_;
+        std::vector<Vorn::Node> nodes_;
+        Vorn::NodeReading reading_;
     };
 
     std::shared_ptr<Watch> watch_;

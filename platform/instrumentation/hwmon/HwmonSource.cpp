@@ -14,27 +14,27 @@ namespace Vorn {
 
 using NodeLexicon::NodeType;
 
-std::vector<Node> HwmonSource::nodes(NodeType type)
+const std::vector<Node>& HwmonSource::nodes(NodeType type)
 {
     catalogue_ = Hwmon::ChipList::instance().present();
     reader_.emplace(catalogue_);
     ahead_.clear();
-    std::vector<Node> nodes;
+    nodes_.clear();
     for (const Hwmon::Feature& feature : catalogue_->features)
         if (feature.type == type)
-            nodes.push_back(feature.node);
-    return nodes;
+            nodes_.push_back(feature.node);
+    return nodes_;
 }
 
-NodeReading HwmonSource::read(const Node& node)
+const NodeReading& HwmonSource::read(const Node& node)
 {
     const Hwmon::Feature& feature = catalogue_->features.at(node.token);
     if (order_ == Order::serial)
-        return reader_->read(feature);
+        return reading_ = reader_->read(feature);
     if (ahead_.empty())
         readAhead(feature.type);
     auto reading = std::exchange(ahead_[node.token], std::nullopt);
-    return reading ? std::move(*reading) : reader_->read(feature);
+    return reading_ = reading ? std::move(*reading) : reader_->read(feature);
 }
 
 // Reads the nodes of the type, chip by chip. A further thread starts only when no chip was finished

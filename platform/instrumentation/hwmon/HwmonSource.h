@@ -25,9 +25,9 @@ public:
 
     // Throws std::runtime_error when libsensors cannot be used. A kernel without hwmon has no
     // nodes.
-    std::vector<Node> nodes(NodeLexicon::NodeType type) override;
+    const std::vector<Node>& nodes(NodeLexicon::NodeType type) override;
 
-    NodeReading read(const Node& node) override;
+    const NodeReading& read(const Node& node) override;
 
 private:
     void readAhead(NodeLexicon::NodeType type);
@@ -35,7 +35,9 @@ private:
     Order order_;
     std::shared_ptr<const Hwmon::Catalogue> catalogue_; // of the last listing; null before
     std::optional<Hwmon::NodeReader> reader_;
+    std::vector<Node> nodes_;                       // of that listing
     std::vector<std::optional<NodeReading>> ahead_; // by token, each until it is requested
+    NodeReading reading_;                           // the last one that was requested
 };
 
 } // namespace Vorn

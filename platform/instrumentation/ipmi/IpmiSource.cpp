@@ -38,19 +38,21 @@ IpmiSource::IpmiSource(const std::string& named)
             "model file " + path + ": it does not say when the sensors were read");
 }
 
-std::vector<Node> IpmiSource::nodes(NodeLexicon::NodeType type)
+const std::vector<Node>& IpmiSource::nodes(NodeLexicon::NodeType type)
 {
-    return file_ ? file_->nodes(type) : std::vector<Node>();
+    static const std::vector<Node> none;
+    return file_ ? file_->nodes(type) : none;
 }
 
-NodeReading IpmiSource::read(const Node& node)
+const NodeReading& IpmiSource::read(const Node& node)
 {
-    NodeReading values = file_->read(node);
-    if (isOutdated()) {
-        values.status = NodeStatus::lostCommunication;
-        values.reading.reset();
-    }
-    return values;
+    const NodeReading& values = file_->read(node);
+    if (!isOutdated())
+        return values;
+    lost_ = values;
+    lost_.status = NodeStatus::lostCommunication;
+    lost_.reading.reset();
+    return lost_;
 }
 
 std::optional<double> IpmiSource::age() const

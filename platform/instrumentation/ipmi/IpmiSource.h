@@ -27,8 +27,8 @@ public:
     // it and the reason.
     explicit IpmiSource(const std::string& named);
 
-    std::vector<Node> nodes(NodeLexicon::NodeType type) override;
-    NodeReading read(const Node& node) override;
+    const std::vector<Node>& nodes(NodeLexicon::NodeType type) override;
+    const NodeReading& read(const Node& node) override;
 
     // Returns how many seconds ago the sensors were read; nothing without a file.
     std::optional<double> age() const;
@@ -37,6 +37,7 @@ private:
     bool isOutdated() const;
 
     std::optional<MachineFileSource> file_;
+    NodeReading lost_; // of the last node that was read from an outdated file
 };
 
 } // namespace Vorn

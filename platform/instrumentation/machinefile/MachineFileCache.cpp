@@ -56,7 +56,8 @@ MachineFileCache::Outcome MachineFileCache::read(const std::string& path)
 {
     const FileContent file = readRegularFile(path, maximumBytes);
     try {
-        return {file.stamp, std::make_shared<const MachineFile>(readMachineFile(file.text)), {}};
+        return {
+            file.stamp, std::make_shared<const ServedMachineFile>(readMachineFile(file.text)), {}};
     } catch (const std::runtime_error& error) {
         return {file.stamp, nullptr, error.what()};
     }

@@ -3,7 +3,7 @@
 #pragma once
 
 #include "platform/instrumentation/FileStamp.h"
-#include "platform/instrumentation/machinefile/MachineFile.h"
+#include "platform/instrumentation/machinefile/ServedMachineFile.h"
 
 #include <map>
 #include <memory>
@@ -19,7 +19,7 @@ public:
     // Returns the cache of this process.
     static MachineFileCache& instance();
 
-    using Content = std::shared_ptr<const MachineFile>;
+    using Content = std::shared_ptr<const ServedMachineFile>;
 
     // Returns what the file holds now. Throws std::runtime_error naming the file, the place in it
     // and the reason.

@@ -3,7 +3,7 @@
 #pragma once
 
 #include "platform/instrumentation/Source.h"
-#include "platform/instrumentation/machinefile/MachineFile.h"
+#include "platform/instrumentation/machinefile/ServedMachineFile.h"
 
 #include <memory>
 #include <string>
@@ -17,14 +17,14 @@ public:
     // Throws std::runtime_error naming the file, the place in it and the reason.
     explicit MachineFileSource(const std::string& path);
 
-    std::vector<Node> nodes(NodeLexicon::NodeType type) override;
-    NodeReading read(const Node& node) override;
+    const std::vector<Node>& nodes(NodeLexicon::NodeType type) override;
+    const NodeReading& read(const Node& node) override;
 
     // Returns when the sensors were read, if a process renews the file.
     const std::optional<Renewal>& renewal() const { return file_->renewal; }
 
 private:
-    std::shared_ptr<const MachineFile> file_;
+    std::shared_ptr<const ServedMachineFile> file_;
 };
 
 // Returns when the file can be served. Throws as the constructor of MachineFileSource does.

@@ -30,18 +30,22 @@ using Vorn::NodeLexicon::Properties;
 // Its readings are a counter, so that each differs from the others.
 class CountingSource final : public Vorn::Source {
 public:
-    std::vector<Vorn::Node> nodes(NodeType type) override
+    const std::vector<Vorn::Node>& nodes(NodeType type) override
     {
-        return {{"/a", "A", static_cast<unsigned>(type), 0}, {"/b", "B", 99, 1}};
+        nodes_ = {{"/a", "A", static_cast<unsigned>(type), 0}, {"/b", "B", 99, 1}};
+        return nodes_;
     }
-    Vorn::NodeReading read(const Vorn::Node&) override
+    const Vorn::NodeReading& read(const Vorn::Node&) override
     {
         ++count_;
-        return {.status = count_, .reading = count_};
+        reading_ = {.status = count_, .reading = count_};
+        return reading_;
     }
 
 private:
     unsigned count_ = 0;
+    std::vector<Vorn::Node> nodes_;
+    Vorn::NodeReading reading_;
 };
 
 struct CountingMachine {
@@ -243,12 +247,16 @@ TEST_F(FailureTest, AtConstructionIsReportedOnce)
 // Has nodes of one type.
 class VoltageSource final : public Vorn::Source {
 public:
-    std::vector<Vorn::Node> nodes(NodeType type) override
+    const std::vector<Vorn::Node>& nodes(NodeType type) override
     {
-        return type == NodeType::Voltage ? std::vector<Vorn::Node>{{"/v", "V", 21, 0}}
-                                         : std::vector<Vorn::Node>{};
+        return type == NodeType::Voltage ? voltages_ : none_;
     }
-    Vorn::NodeReading read(const Vorn::Node&) override { return {}; }
+    const Vorn::NodeReading& read(const Vorn::Node&) override { return reading_; }
+
+private:
+    const std::vector<Vorn::Node> voltages_ = {{"/v", "V", 21, 0}};
+    const std::vector<Vorn::Node> none_;
+    const Vorn::NodeReading reading_;
 };
 
 TEST_F(FailureTest, OfOneSourceTakesNoNodesOfOthersAway)

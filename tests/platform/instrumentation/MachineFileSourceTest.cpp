@@ -32,6 +32,7 @@ using testing::SizeIs;
 using Testing::TemporaryFolder;
 using Testing::walk;
 using Vorn::checkMachineFile;
+using Vorn::NodeLexicon::NodeType;
 
 std::string modelOf(const std::string& description)
 {
@@ -146,7 +147,7 @@ TEST_F(MachineFileSourceTest, IsNotReadAgainWhileItStays)
     EXPECT_EQ(cache.load(path()), first);
     write(modelOf("two"));
     EXPECT_NE(cache.load(path()), first);
-    EXPECT_EQ(first->nodes.at(0).description, "one");
+    EXPECT_EQ(first->nodes.at(NodeType::Voltage).at(0).description, "one");
 }
 
 TEST_F(MachineFileSourceTest, ThatJustChangedIsNotTrustedToShowTheNextChange)
@@ -164,7 +165,12 @@ TEST_F(MachineFileSourceTest, MoreFilesThanTheCacheKeepsAreServedAllTheSame)
             const std::string name = std::to_string(number);
             const std::string file =
                 turn == 0 ? folder_.write(name, modelOf(name)) : (folder_.path() / name).string();
-            EXPECT_EQ(Vorn::MachineFileCache::instance().load(file)->nodes.at(0).description, name);
+            EXPECT_EQ(Vorn::MachineFileCache::instance()
+                          .load(file)
+                          ->nodes.at(NodeType::Voltage)
+                          .at(0)
+                          .description,
+                name);
         }
 }
 
