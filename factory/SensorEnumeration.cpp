@@ -18,8 +18,8 @@ int SensorFactory::getAllSensorCMPIInstances(const CMPIBroker* broker, const CMP
             " isObjPath=", isObjPath, " instances=", &instances, "rc=", rc);
     });
     traced.entering();
-    for (const auto& [deviceID, sensor] : sensorMap)
-        instances.push_back(makeSensorInstance(broker, ref, sensor, properties, isObjPath, rc));
+    for (const Sensor* const sensor : sensorMap.inOrder())
+        instances.push_back(makeSensorInstance(broker, ref, *sensor, properties, isObjPath, rc));
     traced.exiting();
     return 0;
 }
@@ -33,10 +33,10 @@ int SensorFactory::getOneSensorCMPIInstance(const CMPIBroker* broker, const CMPI
     });
     traced.entering();
     const char* const deviceID = charactersOf(key, rc);
-    const auto found = deviceID ? sensorMap.find(deviceID) : sensorMap.end();
-    if (found == sensorMap.end())
+    const Sensor* const found = deviceID ? sensorMap.find(deviceID) : nullptr;
+    if (found == nullptr)
         return 1; // without an exiting line
-    instances.push_back(makeSensorInstance(broker, ref, found->second, properties, false, rc));
+    instances.push_back(makeSensorInstance(broker, ref, *found, properties, false, rc));
     traced.exiting();
     return 0;
 }
@@ -49,12 +49,12 @@ int SensorFactory::getAllSensorCMPIObjPaths(const CMPIBroker* broker, const CMPI
             " broker=", broker, " ref=", ref, " objectPaths=", &objectPaths, " status=", status);
     });
     traced.entering();
-    if (sensorMap.empty()) {
+    if (sensorMap.size() == 0) {
         traceToBroker(broker, CMPI_LEV_INFO, SensorProfileProvider, "***No instance found***");
         traced.exiting();
         return 1;
     }
-    for (const auto& [deviceID, sensor] : sensorMap) {
+    for (const Sensor* const sensor : sensorMap.inOrder()) {
         CMPIObjectPath* const path = newPath(broker, ref, SensorClass, texts.systemName(), status);
         if (path == nullptr) {
             reportFailure(broker, status, SensorProfileProvider, "Create CMPIObjectPath failed.",
@@ -63,7 +63,7 @@ int SensorFactory::getAllSensorCMPIObjPaths(const CMPIBroker* broker, const CMPI
             return 2;
         }
         addTextKey(path, "CreationClassName", SensorClass);
-        addTextKey(path, "DeviceID", sensor.getDeviceID().c_str());
+        addTextKey(path, "DeviceID", sensor->getDeviceID().c_str());
         addTextKey(path, "SystemCreationClassName", ComputerSystemClass);
         addTextKey(path, "SystemName", texts.systemName().c_str());
         objectPaths.push_back(path);

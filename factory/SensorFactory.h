@@ -3,6 +3,7 @@
 #pragma once
 
 #include "factory/RequestTexts.h"
+#include "factory/SensorIndex.h"
 #include "model/Sensor.h"
 #include "model/SensorEnabledLogCap.h"
 
@@ -100,12 +101,11 @@ private:
 
     const RequestTexts texts;
 
-    // The records in the order of the harvest, with duplicates. The maps take over the content of
-    // the records.
+    // The records in the order of the harvest, with duplicates, and those by their identifiers.
     std::vector<Sensor> vectSensor;
+    SensorIndex sensorMap;
     std::vector<SensorEnabledLogCap> vectSensorEnabledLogCap;
-    std::map<std::string, Sensor> sensorMap; // by device identifier; the later duplicate wins
-    std::map<std::string, SensorEnabledLogCap> sensorEnabledLogCapMap; // by instance identifier
+    std::map<std::string, SensorEnabledLogCap> sensorEnabledLogCapMap;
 };
 
 } // namespace Vorn::SensorProfileProvider

@@ -134,6 +134,23 @@ TEST_F(ManyTest, AsManyAreServedAsTheirCountCutTo16BitsSaysFromTheFirstHarvested
     EXPECT_EQ(Host::ObjectPath::of(paths_[0])->key("DeviceID")->text(), "many:/65537");
 }
 
+class ThousandTest : public ManyTest {
+protected:
+    ThousandTest() : ManyTest(1000) {}
+};
+
+TEST_F(ThousandTest, EachIsFoundByItsIdentifierAndNoneByAnother)
+{
+    for (int i = 1; i <= 1000; ++i) {
+        const std::string deviceID = "many:/" + std::to_string(i);
+        ASSERT_EQ(getOne(deviceID.c_str()), 0) << deviceID;
+        EXPECT_EQ(property(*Host::Instance::of(instances_.back()), "DeviceID"),
+            "string \"" + deviceID + "\"");
+        EXPECT_EQ(getOne(("other:/" + std::to_string(i)).c_str()), 1);
+    }
+    EXPECT_EQ(factory_.getNumberOfInstances(), 1000);
+}
+
 class FullCountTest : public ManyTest {
 protected:
     FullCountTest() : ManyTest(65536) {}
