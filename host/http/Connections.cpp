@@ -113,7 +113,7 @@ void Connections::enter(ClientConnection& connection, Phase phase)
     if (connection.phase == Phase::idle && phase != Phase::idle)
         ++busy_;
     if (connection.phase != Phase::idle && phase == Phase::idle && --busy_ == 0)
-        changed_.notify_all();
+        becameIdle_.notify_all();
     if (phase == Phase::idle && isShuttingDown_)
         ::shutdown(connection.descriptor, SHUT_RD);
     connection.phase = phase;
@@ -209,7 +209,7 @@ bool Connections::waitUntil(ClientConnection& connection, Clock::time_point time
 bool Connections::waitUntilIdle(std::chrono::milliseconds timeout)
 {
     std::unique_lock lock(mutex_);
-    return changed_.wait_for(lock, timeout, [this] { return busy_ == 0; });
+    return becameIdle_.wait_for(lock, timeout, [this] { return busy_ == 0; });
 }
 
 void Connections::watch(const std::stop_token& stop)

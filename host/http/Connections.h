@@ -117,9 +117,11 @@ private:
 
     const Limits& limits_;
     mutable std::mutex mutex_;
-    // A first connection, the end of the last request in progress, the end of a wait, the beginning
-    // of the shutdown.
+    // A first connection, the end of a wait, the beginning of the shutdown.
     std::condition_variable_any changed_;
+    // The end of the last request in progress. It is apart since the watcher waits for the others,
+    // and would run after each request of a client.
+    std::condition_variable becameIdle_;
     std::list<ClientConnection> all_;
     std::size_t busy_ = 0; // connections that are not idle
     bool isShuttingDown_ = false;
