@@ -83,9 +83,15 @@ std::vector<std::string> SourceOptions::failures(bool areChipsListed)
 
 ProviderFiles SourceOptions::providerFiles() const
 {
+    ProviderFiles files = sensorProviderFile();
+    files.computerSystem = findComputerSystemProviderFile();
+    return files;
+}
+
+ProviderFiles SourceOptions::sensorProviderFile() const
+{
     // The loader would search its own folders for a name without a slash.
-    return {provider_ ? std::filesystem::absolute(*provider_).string() : findProviderFile(),
-        findComputerSystemProviderFile()};
+    return {provider_ ? std::filesystem::absolute(*provider_).string() : findProviderFile(), {}};
 }
 
 } // namespace Tools

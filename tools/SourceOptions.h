@@ -49,8 +49,10 @@ public:
     // may have changed since the provider read them. REQUIRES: selectMachine() was called.
     static std::vector<std::string> failures(bool areChipsListed);
 
-    // Throws std::runtime_error when no library is given and none is found.
+    // Throw std::runtime_error when no library is given and none is found. The second names the
+    // library of the sensors alone, which is all that sensors need: the other one takes long to load.
     ProviderFiles providerFiles() const;
+    ProviderFiles sensorProviderFile() const;
 
 private:
     std::optional<std::string> model_;

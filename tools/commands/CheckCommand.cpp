@@ -141,7 +141,7 @@ private:
     // Unloads the provider again.
     Sensors readMachine() const
     {
-        ProviderClient provider(source_.providerFiles());
+        ProviderClient provider(source_.sensorProviderFile());
         return readSensors(provider, false);
     }
 

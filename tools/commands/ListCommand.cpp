@@ -65,10 +65,11 @@ private:
     // Sets the name of the class if the user named one. Returns nothing when there is no object.
     std::optional<ExitCode> show(Output& out, std::string& className) const
     {
-        ProviderClient provider(source_.providerFiles());
         const auto& selectors = selection_.selectors();
-        const auto named =
-            selectors.size() == 1 ? provider.declaredClass(selectors.front()) : std::nullopt;
+        const bool mayNameClass = selectors.size() == 1;
+        ProviderClient provider(
+            mayNameClass ? source_.providerFiles() : source_.sensorProviderFile());
+        const auto named = mayNameClass ? provider.declaredClass(selectors.front()) : std::nullopt;
         if (named && *named != sensorClass) {
             className = *named;
             return showObjects(out, provider, className);

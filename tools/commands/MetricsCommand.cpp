@@ -42,7 +42,7 @@ public:
         source_.selectMachine();
         ChipDevices devices;
         const Harvest harvest =
-            readHarvest(ProviderClient(source_.providerFiles()).manager(), devices);
+            readHarvest(ProviderClient(source_.sensorProviderFile()).manager(), devices);
         Exposition exposition(ExpositionForm::text);
         addHarvest(exposition, harvest);
         if (compatible_ && SourceOptions::readsHwmon())

@@ -90,7 +90,7 @@ public:
 private:
     ExitCode watch(Output& out)
     {
-        std::optional<ProviderClient> provider(std::in_place, source_.providerFiles());
+        std::optional<ProviderClient> provider(std::in_place, source_.sensorProviderFile());
         const Sensors all = readSensors(*provider, false);
         isMachineEmpty_ = all.empty();
         const auto selected = selection_.select(all);
@@ -109,7 +109,7 @@ private:
         if (provider)
             provider->beginRequest();
         else
-            provider.emplace(source_.providerFiles());
+            provider.emplace(source_.sensorProviderFile());
         return readSensors(*provider, false);
     }
 
