@@ -5,6 +5,7 @@
 #include "tools/output/Utf8.h"
 
 #include <algorithm>
+#include <utility>
 
 namespace Tools {
 
@@ -14,18 +15,32 @@ constexpr std::size_t leastFirstColumn = 12;
 
 } // namespace
 
+Table::Table(std::vector<Column> columns) : columns_(std::move(columns))
+{
+    widths_.reserve(columns_.size());
+    for (const Column& column : columns_)
+        widths_.push_back(displayWidth(column.title));
+}
+
+void Table::add(std::vector<Cell> cells)
+{
+    for (std::size_t i = 0; i < cells.size(); ++i)
+        widths_[i] = std::max(widths_[i], displayWidth(cells[i].text));
+    rows_.push_back({std::move(cells), false});
+}
+
 std::size_t Table::width(std::size_t minimumOfFirst) const
 {
-    const std::vector<std::size_t> widths = columnWidths();
-    std::size_t sum = std::min(widths[0], minimumOfFirst);
-    for (std::size_t i = 1; i < widths.size(); ++i)
-        sum += columns_[i].gap + widths[i];
+    std::size_t sum = std::min(widths_[0], minimumOfFirst);
+    for (std::size_t i = 1; i < widths_.size(); ++i)
+        sum += columns_[i].gap + widths_[i];
     return sum;
 }
 
-std::vector<Line> Table::lines(const TextStyle& style) const
+template <typename Visitor>
+void Table::visitLines(const TextStyle& style, const Visitor& visit) const
 {
-    std::vector<std::size_t> widths = columnWidths();
+    std::vector<std::size_t> widths = widths_;
     const std::size_t others = width(0);
     const std::size_t room = style.width > others ? style.width - others : 0;
     widths[0] = std::min(widths[0], std::max(room, leastFirstColumn));
@@ -33,36 +48,30 @@ std::vector<Line> Table::lines(const TextStyle& style) const
     std::vector<Cell> titles;
     for (const Column& column : columns_)
         titles.push_back({column.title, Emphasis::heading});
-    std::vector<Line> lines = {lineOf(titles, widths, style)};
+    visit(lineOf(titles, widths, style));
     for (const Row& row : rows_)
-        lines.push_back(
-            row.isHeading ? cutLine(row.cells, style) : lineOf(row.cells, widths, style));
+        visit(row.isHeading ? cutLine(row.cells, style) : lineOf(row.cells, widths, style));
+}
+
+std::vector<Line> Table::lines(const TextStyle& style) const
+{
+    std::vector<Line> lines;
+    visitLines(style, [&](Line line) { lines.push_back(std::move(line)); });
     return lines;
 }
 
 std::string Table::toText(const TextStyle& style) const
 {
     std::string text;
-    for (const Line& line : lines(style))
-        text += textOf(line, style);
+    visitLines(style, [&](const Line& line) { text += textOf(line, style); });
     return text;
-}
-
-std::vector<std::size_t> Table::columnWidths() const
-{
-    std::vector<std::size_t> widths;
-    for (const Column& column : columns_)
-        widths.push_back(displayWidth(column.title));
-    for (const Row& row : rows_)
-        for (std::size_t i = 0; i < row.cells.size() && !row.isHeading; ++i)
-            widths[i] = std::max(widths[i], displayWidth(row.cells[i].text));
-    return widths;
 }
 
 Line Table::lineOf(const std::vector<Cell>& cells, const std::vector<std::size_t>& widths,
     const TextStyle& style) const
 {
     Line line;
+    line.reserve(2 * cells.size());
     std::size_t blanks = 0; // to be written before the next text
     for (std::size_t i = 0; i < cells.size(); ++i) {
         const std::string shown =

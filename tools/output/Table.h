@@ -9,7 +9,6 @@
 
 #include <cstddef>
 #include <string>
-#include <utility>
 #include <vector>
 
 namespace Tools {
@@ -35,10 +34,10 @@ struct Column {
 
 class Table {
 public:
-    explicit Table(std::vector<Column> columns) : columns_(std::move(columns)) {}
+    explicit Table(std::vector<Column> columns);
 
     // REQUIRES: as many cells as there are columns.
-    void add(std::vector<Cell> cells) { rows_.push_back({std::move(cells), false}); }
+    void add(std::vector<Cell> cells);
     // Adds a line whose cells ignore the columns.
     void addHeading(std::vector<Cell> cells) { rows_.push_back({std::move(cells), true}); }
 
@@ -58,11 +57,13 @@ private:
         bool isHeading;
     };
 
-    std::vector<std::size_t> columnWidths() const;
+    template <typename Visitor>
+    void visitLines(const TextStyle& style, const Visitor& visit) const;
     Line lineOf(const std::vector<Cell>& cells, const std::vector<std::size_t>& widths,
         const TextStyle& style) const;
 
     std::vector<Column> columns_;
+    std::vector<std::size_t> widths_; // of the widest cell of each column
     std::vector<Row> rows_;
 };
 

@@ -29,7 +29,9 @@ std::string_view takeNumber(std::string_view& text)
 // Removes the first character and returns it in lower case.
 char32_t takeLetter(std::string_view& text)
 {
-    const Text::Character character = Text::firstCharacter(text);
+    const auto byte = static_cast<unsigned char>(text.front());
+    const Text::Character character =
+        byte < 0x80 ? Text::Character{byte, 1, true} : Text::firstCharacter(text);
     text.remove_prefix(character.size);
     return lowerCase(character.code);
 }
