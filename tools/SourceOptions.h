@@ -50,7 +50,8 @@ public:
     static std::vector<std::string> failures(bool areChipsListed);
 
     // Throw std::runtime_error when no library is given and none is found. The second names the
-    // library of the sensors alone, which is all that sensors need: the other one takes long to load.
+    // library of the sensors alone, which is all that sensors need: the other one takes long to
+    // load.
     ProviderFiles providerFiles() const;
     ProviderFiles sensorProviderFile() const;
 
