@@ -4,15 +4,26 @@
 #include "tools/commands/Commands.h"
 
 #include <malloc.h>
+#include <sys/mman.h>
+
+#include <cstddef>
+#include <cstdlib>
 
 namespace {
 
-// Has the allocator keep freed memory of any size: a command ends soon, and the kernel would map
-// what it needs next page by page.
-void keepFreedMemory()
+// Has the allocator keep freed memory of any size, and take most of what a list of a thousand
+// sensors needs from huge pages where the system grants them: page faults take a tenth of the time
+// of a list otherwise.
+void prepareMemory()
 {
+    constexpr std::size_t hugePage = std::size_t{2} << 20;
+    constexpr std::size_t size = 4 * hugePage;
     ::mallopt(M_MMAP_THRESHOLD, 32 << 20);
     ::mallopt(M_TRIM_THRESHOLD, 64 << 20);
+    void* const block = std::aligned_alloc(hugePage, size);
+    if (block != nullptr)
+        ::madvise(block, size, MADV_HUGEPAGE);
+    std::free(block);
 }
 
 } // namespace
@@ -20,7 +31,7 @@ void keepFreedMemory()
 int main(int argc, char** argv)
 {
     using namespace Tools;
-    keepFreedMemory();
+    prepareMemory();
     return runTool(argc, argv, [&](CLI::App& tool) {
         Commands commands;
         for (auto* const make : {makeListCommand, makeGetCommand, makeWalkCommand, makeWatchCommand,
