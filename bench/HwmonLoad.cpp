@@ -253,6 +253,13 @@ void print(const std::vector<Row>& rows, std::size_t sensors)
     }
 }
 
+// Starts a server that reads chips in parallel, as servers do by default.
+Bench::ServerProcess startServer()
+{
+    const Testing::EnvironmentVariable sources("VORN_INSTRUMENTATION", "hwmon:parallel");
+    return {};
+}
+
 void compare(const HwmonTree& tree, std::size_t rounds)
 {
     const std::size_t sensors = tree.sensors();
@@ -262,7 +269,7 @@ void compare(const HwmonTree& tree, std::size_t rounds)
     const RawReads raw(tree);
     const Provider provider;
     harvest(sensors); // initialises libsensors
-    const Bench::ServerProcess server;
+    const Bench::ServerProcess server = startServer();
     Testing::HttpClient client(server.port());
     const std::string request =
         Testing::cimRequest("EnumerateInstances", Testing::cimClassParameter(className));

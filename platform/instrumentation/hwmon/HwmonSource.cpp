@@ -5,6 +5,7 @@
 #include "platform/instrumentation/hwmon/ChipList.h"
 
 #include <algorithm>
+#include <array>
 #include <atomic>
 #include <chrono>
 #include <future>
@@ -13,6 +14,19 @@
 namespace Vorn {
 
 using NodeLexicon::NodeType;
+
+namespace {
+
+// Whether a chip may take long, by the type that is read: whether one did at the last time. Drivers
+// may keep what they have read for a while, so that only the first type takes long.
+std::array<std::atomic<bool>, 3> mayBeSlow = {true, true, true};
+
+std::size_t indexOf(NodeType type)
+{
+    return static_cast<std::size_t>(type) - static_cast<std::size_t>(NodeType::Tachometer);
+}
+
+} // namespace
 
 const std::vector<Node>& HwmonSource::nodes(NodeType type)
 {
@@ -37,37 +51,50 @@ const NodeReading& HwmonSource::read(const Node& node)
     return reading_ = reading ? std::move(*reading) : reader_->read(feature);
 }
 
-// Reads the nodes of the type, chip by chip. A further thread starts only when no chip was finished
-// in an interval: where all chips are fast, more threads would only cost time.
+// Reads the nodes of the type, chip by chip: in this thread as long as the chips are fast, since
+// starting a thread takes as long as reading some of them. A further thread starts whenever no chip
+// was finished in an interval.
 void HwmonSource::readAhead(NodeType type)
 {
     constexpr std::size_t maximumThreads = 16;
     constexpr auto interval = std::chrono::milliseconds(2);
+    using Clock = std::chrono::steady_clock;
     ahead_.resize(catalogue_->features.size());
     std::atomic<std::size_t> next = 0;
-    const auto readChips = [&] {
+    std::atomic<bool> isSlow = false; // whether a chip took longer
+    const auto readChips = [&](bool isUntilSlow) {
         const auto& features = catalogue_->features;
         Hwmon::NodeReader reader(catalogue_);
-        for (std::size_t chip = next++; chip < catalogue_->chips.size(); chip = next++) {
+        while (!(isUntilSlow && isSlow)) {
+            const std::size_t chip = next++;
+            if (chip >= catalogue_->chips.size())
+                break;
+            const auto begin = Clock::now();
             auto feature = std::ranges::lower_bound(features, chip, {}, &Hwmon::Feature::chip);
             for (; feature != features.end() && feature->chip == chip; ++feature)
                 if (feature->type == type)
                     ahead_[feature->node.token] = reader.read(*feature);
+            if (Clock::now() - begin > interval)
+                isSlow = true;
         }
     };
+    std::atomic<bool>& wasSlow = mayBeSlow.at(indexOf(type));
+    if (!wasSlow)
+        readChips(true);
     // Where no thread can be started, get() reads the chips.
     std::vector<std::future<void>> threads;
     bool isStuck = true;
     while (next < catalogue_->chips.size() && threads.size() < maximumThreads) {
         const std::size_t before = next;
         if (isStuck)
-            threads.push_back(std::async(readChips));
+            threads.push_back(std::async(readChips, false));
         if (threads.back().wait_for(interval) != std::future_status::timeout)
             break;
         isStuck = next <= before + 1; // a thread that started takes one chip at once
     }
     for (auto& thread : threads)
         thread.get();
+    wasSlow = isSlow.load();
 }
 
 } // namespace Vorn

@@ -17,8 +17,8 @@ namespace Vorn {
 // meanwhile has status 13 and no properties.
 class HwmonSource final : public Source {
 public:
-    // In parallel, all nodes of a listing are read when the first of them is, in threads that end
-    // with that call: a chip that takes long to be read does not delay the others.
+    // In parallel, all nodes of a listing are read when the first of them is, where chips take long
+    // in threads that end with that call: such a chip does not delay the others.
     enum class Order { serial, parallel };
 
     explicit HwmonSource(Order order = Order::serial) : order_(order) {}
