@@ -15,7 +15,6 @@
 #include "tools/output/SensorDetails.h"
 #include "tools/output/SensorJson.h"
 #include "tools/sensors/ChipDevices.h"
-#include "tools/sensors/Sources.h"
 
 #include <CLI/CLI.hpp>
 
@@ -70,7 +69,7 @@ private:
             if (found.object->className() == sensorClass)
                 sensors.emplace_back(*found.object);
         }
-        if (readsHwmon())
+        if (source_.readsHwmon())
             nameDevices(sensors);
         write(out, provider, objects, sensors);
         return {};

@@ -15,7 +15,6 @@
 #include "tools/output/SensorTable.h"
 #include "tools/output/Utf8.h"
 #include "tools/sensors/ChipDevices.h"
-#include "tools/sensors/Sources.h"
 
 #include <CLI/CLI.hpp>
 
@@ -103,7 +102,7 @@ private:
 
     void write(Output& out, Sensors sensors) const
     {
-        const bool isOfKernel = readsHwmon();
+        const bool isOfKernel = source_.readsHwmon();
         if (isOfKernel && display_.form() != Form::cim)
             nameDevices(sensors);
         switch (display_.form()) {
@@ -120,7 +119,7 @@ private:
         if (sensors.empty())
             return;
         const bool isGrouped = display_.form() == Form::table;
-        const std::string age = isGrouped ? ageOfCollection() : "";
+        const std::string age = isGrouped ? SourceOptions::ageOfCollection() : "";
         for (Sensor& sensor : sensors)
             if (sensor.chip == "ipmi")
                 sensor.device = age;

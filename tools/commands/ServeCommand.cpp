@@ -36,9 +36,12 @@ private:
 ServeCommand::ServeCommand(CLI::App& tool)
     : Command(tool, "serve", "Answer CIM clients, browsers and Prometheus over HTTP")
 {
-    options_.addTo(parser());
-    source_.addModel(parser());
-    source_.addProvider(parser());
+    // Other commands need not wait for the many options.
+    parser().preparse_callback([this](std::size_t) {
+        options_.addTo(parser());
+        source_.addModel(parser());
+        source_.addProvider(parser());
+    });
     parser().footer(serveFooter);
 }
 

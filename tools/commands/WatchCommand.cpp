@@ -10,7 +10,6 @@
 #include "tools/output/Output.h"
 #include "tools/output/Utf8.h"
 #include "tools/sensors/ChipDevices.h"
-#include "tools/sensors/Sources.h"
 #include "tools/watch/Screen.h"
 #include "tools/watch/WatchView.h"
 
@@ -117,7 +116,7 @@ private:
     Sensors selected(const Sensors& all) const
     {
         Sensors sensors = selection_.select(all).sensors;
-        if (readsHwmon())
+        if (SourceOptions::readsHwmon())
             nameDevices(sensors);
         return sensors;
     }
@@ -136,7 +135,7 @@ private:
             Sensors all = readAll(provider);
             if (all.empty() || history.isSomeAbsent(selected(all))) {
                 provider.reset();
-                if (const auto failures = failuresOfSources(false); !failures.empty())
+                if (const auto failures = SourceOptions::failures(false); !failures.empty())
                     return {history.update(selected(all), now, true), failures.front()};
                 all = readAll(provider); // the source may have recovered since
             }

@@ -13,6 +13,16 @@ namespace {
 
 constexpr std::size_t leastFirstColumn = 12;
 
+void append(std::string& text, const Line& line, const TextStyle& style)
+{
+    for (const Cell& cell : line)
+        if (style.isColored)
+            text += emphasized(cell.text, cell.emphasis, true);
+        else
+            text += cell.text;
+    text += '\n';
+}
+
 } // namespace
 
 Table::Table(std::vector<Column> columns) : columns_(std::move(columns))
@@ -63,7 +73,7 @@ std::vector<Line> Table::lines(const TextStyle& style) const
 std::string Table::toText(const TextStyle& style) const
 {
     std::string text;
-    visitLines(style, [&](const Line& line) { text += textOf(line, style); });
+    visitLines(style, [&](const Line& line) { append(text, line, style); });
     return text;
 }
 
@@ -74,7 +84,7 @@ Line Table::lineOf(const std::vector<Cell>& cells, const std::vector<std::size_t
     line.reserve(2 * cells.size());
     std::size_t blanks = 0; // to be written before the next text
     for (std::size_t i = 0; i < cells.size(); ++i) {
-        const std::string shown =
+        std::string shown =
             i == 0 ? cutToWidth(cells[i].text, widths[i], style.isUtf8) : cells[i].text;
         const std::size_t padding = widths[i] - displayWidth(shown);
         const bool isRight = columns_[i].alignment == Column::Alignment::right;
@@ -82,7 +92,7 @@ Line Table::lineOf(const std::vector<Cell>& cells, const std::vector<std::size_t
         if (!shown.empty()) {
             if (blanks > 0)
                 line.push_back({std::string(blanks, ' ')});
-            line.push_back({shown, cells[i].emphasis});
+            line.push_back({std::move(shown), cells[i].emphasis});
             blanks = 0;
         }
         if (!isRight)
@@ -94,9 +104,8 @@ Line Table::lineOf(const std::vector<Cell>& cells, const std::vector<std::size_t
 std::string textOf(const Line& line, const TextStyle& style)
 {
     std::string text;
-    for (const Cell& cell : line)
-        text += emphasized(cell.text, cell.emphasis, style.isColored);
-    return text + '\n';
+    append(text, line, style);
+    return text;
 }
 
 Line cutLine(const Line& line, const TextStyle& style)

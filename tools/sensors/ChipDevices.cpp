@@ -166,6 +166,8 @@ void ChipDevices::nameIn(Sensors& sensors, const Vorn::Hwmon::Machine& machine)
 
 void nameDevices(Sensors& sensors)
 {
+    if (std::none_of(sensors.begin(), sensors.end(), mayHaveDevice))
+        return; // without a list of the chips
     try {
         ChipDevices().nameIn(sensors, Vorn::Hwmon::presentMachine());
     } catch (const std::system_error&) { // the chips cannot be listed
@@ -187,12 +189,16 @@ std::string otherChannels()
     std::set<std::string> channels;
     std::set<std::string> kinds;
     for (const std::string& chip : entriesOf(hwmonFolder))
-        for (const std::string& name : entriesOf(std::string(hwmonFolder).append("/").append(chip)))
+        visitEntries(std::string(hwmonFolder).append("/").append(chip), [&](std::string_view name) {
             for (const OtherKind& each : otherKinds)
-                if (name.starts_with(each.attribute) && name.ends_with(each.suffix)) {
-                    channels.insert(chip + name.substr(0, name.size() - each.suffix.size()));
+                if (name.front() == each.attribute.front() && name.starts_with(each.attribute) &&
+                    name.ends_with(each.suffix)) {
+                    name.remove_suffix(each.suffix.size());
+                    channels.insert(std::string(chip).append(name));
                     kinds.insert(each.kind);
+                    return;
                 }
+        });
     if (channels.empty())
         return "";
     std::string list;

@@ -11,23 +11,31 @@
 #include <memory>
 #include <optional>
 #include <string>
+#include <string_view>
 #include <vector>
 
 namespace Tools {
 
 inline constexpr const char* hwmonFolder = "/sys/class/hwmon";
 
-// Returns the names in a folder that are not hidden, in the kernel's order; none when it cannot be
-// read.
+// Calls the visitor with the names in a folder that are not hidden, in the kernel's order; not at
+// all when it cannot be read.
+template <typename Visitor>
+void visitEntries(const std::string& folder, const Visitor& visit)
+{
+    const std::unique_ptr<DIR, int (*)(DIR*)> directory(::opendir(folder.c_str()), ::closedir);
+    if (!directory)
+        return;
+    while (const dirent* const entry = ::readdir(directory.get()))
+        if (entry->d_name[0] != '.')
+            visit(std::string_view(entry->d_name));
+}
+
+// Returns these names.
 inline std::vector<std::string> entriesOf(const std::string& folder)
 {
     std::vector<std::string> names;
-    const std::unique_ptr<DIR, int (*)(DIR*)> directory(::opendir(folder.c_str()), ::closedir);
-    if (!directory)
-        return names;
-    while (const dirent* const entry = ::readdir(directory.get()))
-        if (entry->d_name[0] != '.')
-            names.emplace_back(entry->d_name);
+    visitEntries(folder, [&](std::string_view name) { names.emplace_back(name); });
     return names;
 }
 

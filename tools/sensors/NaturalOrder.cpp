@@ -29,9 +29,7 @@ std::string_view takeNumber(std::string_view& text)
 // Removes the first character and returns it in lower case.
 char32_t takeLetter(std::string_view& text)
 {
-    const auto byte = static_cast<unsigned char>(text.front());
-    const Text::Character character =
-        byte < 0x80 ? Text::Character{byte, 1, true} : Text::firstCharacter(text);
+    const Text::Character character = Text::firstCharacter(text);
     text.remove_prefix(character.size);
     return lowerCase(character.code);
 }

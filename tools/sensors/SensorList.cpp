@@ -9,21 +9,49 @@
 
 #include <algorithm>
 #include <map>
+#include <string_view>
+#include <unordered_map>
+#include <utility>
 
 namespace Tools {
 
 namespace {
 
-// Sorts pointers, since a sensor is large.
+// Returns the places of the chips in a list, by their names. Names that have no order, such as
+// those that differ in letter case only, have the same place.
+std::unordered_map<std::string_view, std::size_t> placesOfChips(const Sensors& sensors)
+{
+    std::unordered_map<std::string_view, std::size_t> places;
+    for (const Sensor& sensor : sensors)
+        places.try_emplace(sensor.chip);
+    std::vector<std::string_view> names;
+    names.reserve(places.size());
+    for (const auto& [name, place] : places)
+        names.push_back(name);
+    std::sort(names.begin(), names.end(),
+        [](auto first, auto second) { return compareNaturally(first, second) < 0; });
+    for (std::size_t i = 1; i < names.size(); ++i)
+        places[names[i]] = places[names[i - 1]] + (compareNaturally(names[i - 1], names[i]) < 0);
+    return places;
+}
+
+// Sorts pointers, since a sensor is large, and compares the names of two chips once.
 template <typename Each, typename All>
 std::vector<Each*> listOrderOf(All& sensors)
 {
-    std::vector<Each*> order;
-    order.reserve(sensors.size());
+    const auto places = placesOfChips(sensors);
+    std::vector<std::pair<std::size_t, Each*>> placed;
+    placed.reserve(sensors.size());
     for (Each& sensor : sensors)
-        order.push_back(&sensor);
-    std::sort(order.begin(), order.end(),
-        [](const Sensor* first, const Sensor* second) { return isListedBefore(*first, *second); });
+        placed.emplace_back(places.at(sensor.chip), &sensor);
+    std::sort(placed.begin(), placed.end(), [](const auto& first, const auto& second) {
+        return first.first != second.first ? first.first < second.first
+                                           : isListedBefore(*first.second, *second.second);
+    });
+    std::vector<Each*> order;
+    order.reserve(placed.size());
+    for (const auto& [place, sensor] : placed)
+        order.push_back(sensor);
     return order;
 }
 
