@@ -4,15 +4,24 @@
 # The presets compile several files of a target as one, in a fraction of the time. FILES_APART is
 # for targets whose files define the same names in unnamed namespaces.
 
-# sensor_profile_room(NAME [FILES_APART] SOURCES ... [USES public libraries ...]
-#                     [PRIVATELY private libraries ...])
+# sensor_profile_room(NAME [FILES_APART] [FUZZED] [PARSES_OPTIONS] SOURCES ...
+#                     [USES public libraries ...] [PRIVATELY private libraries ...])
+# A FUZZED room is compiled with the counters that guide its fuzz target. A room that PARSES_OPTIONS
+# of the command line is hardly optimised: the templates for that take longest of all and run once.
 function(sensor_profile_room name)
-  cmake_parse_arguments(room "FILES_APART" "" "SOURCES;USES;PRIVATELY" ${ARGN})
+  cmake_parse_arguments(
+    room "FILES_APART;FUZZED;PARSES_OPTIONS" "" "SOURCES;USES;PRIVATELY" ${ARGN})
   add_library(${name} STATIC ${room_SOURCES})
   target_include_directories(${name} PUBLIC "${PROJECT_SOURCE_DIR}")
   target_link_libraries(${name} PUBLIC ${room_USES} PRIVATE ${room_PRIVATELY})
   if(room_FILES_APART)
     set_target_properties(${name} PROPERTIES UNITY_BUILD OFF)
+  endif()
+  if(room_FUZZED AND SENSOR_PROFILE_FUZZ)
+    target_compile_options(${name} PRIVATE -fsanitize=fuzzer-no-link)
+  endif()
+  if(room_PARSES_OPTIONS)
+    target_compile_options(${name} PRIVATE $<$<CONFIG:Debug>:-O0> $<$<CONFIG:Release>:-O1>)
   endif()
 endfunction()
 
@@ -63,10 +72,6 @@ function(sensor_profile_test_executable name)
   target_link_libraries(${name} PRIVATE GTest::gmock GTest::gtest_main)
   # Optimising the tests would only take time, and _FORTIFY_SOURCE needs optimisation.
   target_compile_options(${name} PRIVATE -O0 -U_FORTIFY_SOURCE)
-  if(SENSOR_PROFILE_FUZZ)
-    # Fuzzers are guided by the coverage of the rooms, not of the tests.
-    target_compile_options(${name} PRIVATE -fno-sanitize=fuzzer-no-link)
-  endif()
   target_compile_definitions(${name} PRIVATE
     SENSOR_PROFILE_SOURCE_DIR="${PROJECT_SOURCE_DIR}"
     SENSOR_PROFILE_BINARY_DIR="${PROJECT_BINARY_DIR}")

@@ -33,11 +33,6 @@ elseif(CMAKE_BUILD_TYPE STREQUAL "Release")
   add_compile_options(-U_FORTIFY_SOURCE -D_FORTIFY_SOURCE=2)
 endif()
 
-# The instrumentation that guides the fuzzers.
-if(SENSOR_PROFILE_FUZZ)
-  add_compile_options(-fsanitize=fuzzer-no-link)
-endif()
-
 if(SENSOR_PROFILE_COVERAGE)
   # Counters that threads share would otherwise lose counts, even below zero.
   add_compile_options(--coverage -fprofile-update=atomic)

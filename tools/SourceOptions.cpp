@@ -2,18 +2,13 @@
 
 #include "tools/SourceOptions.h"
 
-#include "platform/instrumentation/Instrumentation.h"
-#include "platform/instrumentation/OpenSource.h"
-#include "platform/instrumentation/ipmi/IpmiSource.h"
+#include "platform/instrumentation/SourceList.h"
 #include "platform/instrumentation/machinefile/MachineFileSource.h"
 #include "tools/cim/ProviderFile.h"
 
 #include <CLI/CLI.hpp>
 
-#include <algorithm>
-#include <cmath>
 #include <cstdlib>
-#include <exception>
 #include <filesystem>
 
 namespace Tools {
@@ -40,45 +35,6 @@ void SourceOptions::selectMachine() const
     const std::string entry =
         Vorn::formatSourceEntry("model", std::filesystem::absolute(*model_).string());
     ::setenv("VORN_INSTRUMENTATION", entry.c_str(), 1);
-}
-
-std::vector<Vorn::SourceEntry> SourceOptions::sources()
-{
-    const char* const list = std::getenv("VORN_INSTRUMENTATION");
-    return Vorn::parseSourceList(
-        list == nullptr || *list == '\0' ? Vorn::Instrumentation::defaultSources : list);
-}
-
-bool SourceOptions::readsHwmon()
-{
-    const auto entries = sources();
-    return std::any_of(entries.begin(), entries.end(),
-        [](const Vorn::SourceEntry& entry) { return entry.scheme == "hwmon"; });
-}
-
-std::string SourceOptions::ageOfCollection()
-{
-    double oldest = -1;
-    for (const Vorn::SourceEntry& entry : sources())
-        try {
-            if (entry.scheme == "ipmi")
-                oldest = std::max(oldest, Vorn::IpmiSource(entry.argument).age().value_or(-1));
-        } catch (const std::exception&) { // the library has reported the reason
-        }
-    return oldest < 0 ? "" : "read " + std::to_string(std::lround(oldest)) + " s ago";
-}
-
-std::vector<std::string> SourceOptions::failures(bool areChipsListed)
-{
-    std::vector<std::string> reasons;
-    for (const Vorn::SourceEntry& entry : sources())
-        try {
-            if (entry.scheme != "hwmon" || !areChipsListed)
-                Vorn::openSource(entry)->nodes(Vorn::NodeLexicon::NodeType::Temperature);
-        } catch (const std::exception& error) {
-            reasons.emplace_back(error.what());
-        }
-    return reasons;
 }
 
 ProviderFiles SourceOptions::providerFiles() const

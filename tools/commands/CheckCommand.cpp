@@ -10,6 +10,7 @@
 #include "tools/output/Output.h"
 #include "tools/output/Terminal.h"
 #include "tools/sensors/Selector.h"
+#include "tools/sensors/Sources.h"
 
 #include <CLI/CLI.hpp>
 
@@ -102,7 +103,7 @@ public:
                     report.add(CheckStatus::unknown, nothingMatches(each.selector, all));
         const bool areChipsListed = std::any_of(all.begin(), all.end(),
             [](const Sensor& sensor) { return sensor.path.starts_with("/hwmon/"); });
-        for (const std::string& reason : SourceOptions::failures(areChipsListed))
+        for (const std::string& reason : failuresOfSources(areChipsListed))
             report.add(CheckStatus::unknown, reason);
         if (all.empty())
             report.add(CheckStatus::unknown, "this machine has no sensors");

@@ -15,6 +15,7 @@
 #include "tools/output/SensorDetails.h"
 #include "tools/output/SensorJson.h"
 #include "tools/sensors/ChipDevices.h"
+#include "tools/sensors/Sources.h"
 
 #include <CLI/CLI.hpp>
 
@@ -69,7 +70,7 @@ private:
             if (found.object->className() == sensorClass)
                 sensors.emplace_back(*found.object);
         }
-        if (source_.readsHwmon())
+        if (readsHwmon())
             nameDevices(sensors);
         write(out, provider, objects, sensors);
         return {};

@@ -15,6 +15,7 @@
 #include "tools/output/SensorTable.h"
 #include "tools/output/Utf8.h"
 #include "tools/sensors/ChipDevices.h"
+#include "tools/sensors/Sources.h"
 
 #include <CLI/CLI.hpp>
 
@@ -102,7 +103,7 @@ private:
 
     void write(Output& out, Sensors sensors) const
     {
-        const bool isOfKernel = source_.readsHwmon();
+        const bool isOfKernel = readsHwmon();
         if (isOfKernel && display_.form() != Form::cim)
             nameDevices(sensors);
         switch (display_.form()) {
@@ -119,7 +120,7 @@ private:
         if (sensors.empty())
             return;
         const bool isGrouped = display_.form() == Form::table;
-        const std::string age = isGrouped ? SourceOptions::ageOfCollection() : "";
+        const std::string age = isGrouped ? ageOfCollection() : "";
         for (Sensor& sensor : sensors)
             if (sensor.chip == "ipmi")
                 sensor.device = age;

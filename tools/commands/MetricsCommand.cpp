@@ -8,6 +8,7 @@
 #include "tools/metrics/HwmonMetrics.h"
 #include "tools/output/FileReplacement.h"
 #include "tools/output/Output.h"
+#include "tools/sensors/Sources.h"
 #include "tools/serve/CompatibleOption.h"
 
 #include <CLI/CLI.hpp>
@@ -45,7 +46,7 @@ public:
             readHarvest(ProviderClient(source_.sensorProviderFile()).manager(), devices);
         Exposition exposition(ExpositionForm::text);
         addHarvest(exposition, harvest);
-        if (compatible_ && SourceOptions::readsHwmon())
+        if (compatible_ && readsHwmon())
             addHwmon(exposition);
         const std::string text = std::move(exposition).finish();
         if (file_)

@@ -7,6 +7,7 @@
 #include "tools/output/FileReplacement.h"
 #include "tools/output/JsonText.h"
 #include "tools/output/Output.h"
+#include "tools/sensors/Sources.h"
 
 #include <CLI/CLI.hpp>
 
@@ -37,7 +38,7 @@ public:
         const std::string recording = escapeUnprintable(Vorn::recordMachineFile());
         const bool isEmpty = countSensors() == 0;
         // A record of the other sources is no record of the machine.
-        if (const auto failures = SourceOptions::failures(false); !failures.empty())
+        if (const auto failures = failuresOfSources(false); !failures.empty())
             throw std::runtime_error(failures.front());
         if (!file_ || *file_ == "-")
             out.write(recording);

@@ -10,6 +10,7 @@
 #include "tools/output/Output.h"
 #include "tools/output/Utf8.h"
 #include "tools/sensors/ChipDevices.h"
+#include "tools/sensors/Sources.h"
 #include "tools/watch/Screen.h"
 #include "tools/watch/WatchView.h"
 
@@ -116,7 +117,7 @@ private:
     Sensors selected(const Sensors& all) const
     {
         Sensors sensors = selection_.select(all).sensors;
-        if (SourceOptions::readsHwmon())
+        if (readsHwmon())
             nameDevices(sensors);
         return sensors;
     }
@@ -135,7 +136,7 @@ private:
             Sensors all = readAll(provider);
             if (all.empty() || history.isSomeAbsent(selected(all))) {
                 provider.reset();
-                if (const auto failures = SourceOptions::failures(false); !failures.empty())
+                if (const auto failures = failuresOfSources(false); !failures.empty())
                     return {history.update(selected(all), now, true), failures.front()};
                 all = readAll(provider); // the source may have recovered since
             }

@@ -7,8 +7,8 @@
 #include "host/manager/Manager.h"
 #include "platform/instrumentation/OpenSource.h"
 #include "platform/instrumentation/hwmon/ChipList.h"
-#include "tools/SourceOptions.h"
 #include "tools/cim/ProviderClient.h"
+#include "tools/sensors/Sources.h"
 
 #include <algorithm>
 #include <exception>
@@ -89,7 +89,7 @@ bool isUp(const Vorn::SourceEntry& entry, const Chips& chips, const IsMissing& i
 std::map<std::string, bool> statesOfSources(const Chips& chips, const IsMissing& isMissing)
 {
     std::map<std::string, bool> isUpByName;
-    for (const Vorn::SourceEntry& entry : SourceOptions::sources()) {
+    for (const Vorn::SourceEntry& entry : configuredSources()) {
         const std::string& name = entry.scheme == "hwmon" ? entry.scheme : entry.text;
         bool& areAllUp = isUpByName.try_emplace(name, true).first->second;
         areAllUp = areAllUp && isUp(entry, chips, isMissing);
@@ -133,7 +133,7 @@ Harvest readHarvest(const Host::Manager& manager, ChipDevices& devices)
 {
     const auto begin = std::chrono::steady_clock::now();
     Harvest harvest{readSensors(manager), {}};
-    const Chips chips = SourceOptions::readsHwmon() ? listChips(anyAge) : nullptr;
+    const Chips chips = readsHwmon() ? listChips(anyAge) : nullptr;
     if (chips)
         devices.nameIn(harvest.sensors, chips->machine);
     harvest.sources = statesOfSources(harvest.sensors, chips);

@@ -18,6 +18,7 @@
 #include "tools/metrics/RequestCounts.h"
 #include "tools/output/Output.h"
 #include "tools/page/PageService.h"
+#include "tools/sensors/Sources.h"
 #include "tools/serve/FreedMemory.h"
 #include "tools/serve/Greeting.h"
 #include "tools/serve/MemoryReturn.h"
@@ -83,7 +84,7 @@ void requireReadable(const std::string& file)
 std::vector<std::string> modelFiles()
 {
     std::vector<std::string> files;
-    for (const Vorn::SourceEntry& entry : SourceOptions::sources())
+    for (const Vorn::SourceEntry& entry : configuredSources())
         if (entry.scheme == "model")
             files.push_back(entry.argument);
     return files;
@@ -164,7 +165,7 @@ public:
             operations.addTo(exposition);
             addResponses(exposition, responses);
             addHeldObjects(exposition, objects.heldObjects());
-            if (options_.compatible && SourceOptions::readsHwmon())
+            if (options_.compatible && readsHwmon())
                 addHwmon(exposition);
         });
         beginLog(renounceRoot(options_.user), out);

@@ -16,7 +16,7 @@ namespace Tools {
 namespace {
 
 constexpr std::size_t keptChanges = 100;
-constexpr std::size_t leastName = 16;
+constexpr std::size_t leastNameWidth = 16;
 constexpr std::size_t leastSparkline = 8;
 constexpr const char* help = "q quit  s sort  p problems only  arrows, PgUp, PgDn, Home scroll";
 
@@ -113,7 +113,7 @@ Table WatchView::table(
     if (used + 2 + leastSparkline <= style.width)
         return build(true, style.width - used - 2);
     Table narrow = build(true, leastSparkline);
-    return narrow.width(leastName) <= style.width ? narrow : build(false, 0);
+    return narrow.width(leastNameWidth) <= style.width ? narrow : build(false, 0);
 }
 
 Line WatchView::title(const std::string& interval) const
