@@ -46,7 +46,7 @@ CMPIInstance* SensorFactory::makeSensorEnabledLogicalElementCapInstance(const CM
                 " properties=", properties, " IsObjPath=", isObjPath, " rc=", rc);
         });
     traced.entering(FactoryLines::makeCapabilitiesInstance.entry);
-    const PropertySelection selection(properties, isObjPath);
+    PropertySelection selection(properties, isObjPath);
     CMPIInstance* const instance =
         newCapabilitiesInstance(broker, ref, texts.systemName(), properties, rc);
     if (isUsable(instance)) {

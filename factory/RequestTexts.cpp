@@ -6,6 +6,9 @@
 #include "platform/locale/Locale.h"
 #include "platform/locale/ResourceString.h"
 
+#include <algorithm>
+#include <string_view>
+
 namespace Vorn::SensorProfileProvider {
 
 namespace {
@@ -16,29 +19,41 @@ constexpr unsigned long resourceComponent = 2;
 // Captions and descriptions are truncated to one character less.
 constexpr std::size_t localisedTextSize = 512;
 
-std::string filledIn(const std::wstring& format, const std::string& elementName)
-{
-    return make_string(formatText(format, elementName, localisedTextSize));
-}
+constexpr std::wstring_view insert = L"%s";
 
 } // namespace
 
-RequestTexts::RequestTexts()
+RequestTexts::Format::Format(const std::wstring& text)
+    : wide(text), before(make_string(text.substr(0, text.find(insert)))),
+      after(make_string(text.substr(text.find(insert) + insert.size())))
 {
-    const std::wstring library =
-        Locale::getResourceLibrary(resourceComponent, Locale::getLanguageId());
-    captionFormat_ = ResourceString(library, L"MSGID_SENSOR_CAPTION").text();
-    descriptionFormat_ = ResourceString(library, L"MSGID_SENSOR_DESCRIPTION").text();
+}
+
+RequestTexts::RequestTexts()
+    : library_(Locale::getResourceLibrary(resourceComponent, Locale::getLanguageId())),
+      caption_(ResourceString(library_, L"MSGID_SENSOR_CAPTION").text()),
+      description_(ResourceString(library_, L"MSGID_SENSOR_DESCRIPTION").text())
+{
 }
 
 std::string RequestTexts::caption(const std::string& elementName) const
 {
-    return filledIn(captionFormat_, elementName);
+    return filledIn(caption_, elementName);
 }
 
 std::string RequestTexts::description(const std::string& elementName) const
 {
-    return filledIn(descriptionFormat_, elementName);
+    return filledIn(description_, elementName);
+}
+
+std::string RequestTexts::filledIn(const Format& format, const std::string& elementName)
+{
+    // Most names are short and of ASCII, where the conversions would change nothing.
+    const bool isAscii = std::all_of(elementName.begin(), elementName.end(),
+        [](char character) { return static_cast<unsigned char>(character) < 0x80; });
+    if (isAscii && format.wide.size() - insert.size() + elementName.size() < localisedTextSize)
+        return format.before + elementName + format.after;
+    return make_string(formatText(format.wide, elementName, localisedTextSize));
 }
 
 } // namespace Vorn::SensorProfileProvider

@@ -21,9 +21,20 @@ public:
     std::string description(const std::string& elementName) const;
 
 private:
+    struct Format {
+        explicit Format(const std::wstring& text);
+
+        std::wstring wide;
+        std::string before; // the insert, in UTF-8
+        std::string after;
+    };
+
+    static std::string filledIn(const Format& format, const std::string& elementName);
+
     std::string systemName_ = getSystemName();
-    std::wstring captionFormat_;
-    std::wstring descriptionFormat_;
+    std::wstring library_; // of the texts
+    Format caption_;
+    Format description_;
 };
 
 } // namespace Vorn::SensorProfileProvider

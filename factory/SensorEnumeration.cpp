@@ -4,6 +4,7 @@
 
 #include "factory/BrokerCalls.h"
 #include "factory/ClassNames.h"
+#include "factory/PropertySelection.h"
 #include "factory/SensorFactory.h"
 #include "factory/TraceLines.h"
 
@@ -18,8 +19,12 @@ int SensorFactory::getAllSensorCMPIInstances(const CMPIBroker* broker, const CMP
             " isObjPath=", isObjPath, " instances=", &instances, "rc=", rc);
     });
     traced.entering();
-    for (const Sensor* const sensor : sensorMap.inOrder())
-        instances.push_back(makeSensorInstance(broker, ref, *sensor, properties, isObjPath, rc));
+    PropertySelection selection(properties, isObjPath);
+    Sensor copy; // keeps its memory from record to record
+    for (const Sensor* const sensor : sensorMap.inOrder()) {
+        copy = *sensor;
+        instances.push_back(makeInstance(broker, ref, copy, properties, selection, isObjPath, rc));
+    }
     traced.exiting();
     return 0;
 }

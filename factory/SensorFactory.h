@@ -15,6 +15,8 @@
 
 namespace Vorn::SensorProfileProvider {
 
+class PropertySelection;
+
 // Harvests the machine for one request and converts the records into CIM instances and object
 // paths. A handler creates it on its stack. The CMPI objects belong to the broker and outlive it.
 //
@@ -98,6 +100,10 @@ public:
 private:
     void _createSensorMap();
     void _createEnabledLogicalElementCapMap();
+    // Makes an instance as makeSensorInstance() does, and changes the record. The selection is that
+    // of the properties for all instances of the request.
+    CMPIInstance* makeInstance(const CMPIBroker* broker, const CMPIObjectPath* ref, Sensor& snsr,
+        const char** properties, PropertySelection& selection, bool isObjPath, CMPIStatus* rc);
 
     const RequestTexts texts;
 

@@ -63,7 +63,7 @@ constexpr const char* operationalStatusFailedTrace =
 // Sets the selected properties of one instance in order.
 class SensorProperties {
 public:
-    SensorProperties(Sensor& sensor, const RequestTexts& texts, const PropertySelection& selection,
+    SensorProperties(Sensor& sensor, const RequestTexts& texts, PropertySelection& selection,
         const InstanceWriter& writer, CMPIStatus* rc)
         : sensor_(sensor), texts_(texts), selection_(selection), writer_(writer), rc_(rc)
     {
@@ -168,7 +168,7 @@ private:
 
     Sensor& sensor_;
     const RequestTexts& texts_;
-    const PropertySelection& selection_;
+    PropertySelection& selection_;
     const InstanceWriter& writer_;
     CMPIStatus* rc_;
 };
@@ -178,12 +178,19 @@ private:
 CMPIInstance* SensorFactory::makeSensorInstance(const CMPIBroker* broker, const CMPIObjectPath* ref,
     Sensor snsr, const char** properties, bool isObjPath, CMPIStatus* rc)
 {
+    PropertySelection selection(properties, isObjPath);
+    return makeInstance(broker, ref, snsr, properties, selection, isObjPath, rc);
+}
+
+CMPIInstance* SensorFactory::makeInstance(const CMPIBroker* broker, const CMPIObjectPath* ref,
+    Sensor& snsr, const char** properties, PropertySelection& selection, bool isObjPath,
+    CMPIStatus* rc)
+{
     const TracedOperation traced(factoryModule(), operation, [&] {
         return parameterList(" broker=", broker, " ref=", ref, " snsr=", &snsr,
             " properties=", properties, " isObjPath=", isObjPath, " rc=", rc);
     });
     traced.entering(FactoryLines::makeSensorInstance.entry);
-    const PropertySelection selection(properties, isObjPath);
     CMPIInstance* const instance =
         newSensorInstance(broker, ref, snsr, texts.systemName(), properties);
     if (isUsable(instance)) {

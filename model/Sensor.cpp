@@ -56,6 +56,7 @@ std::string Sensor::getElementName() const
 std::vector<std::string> Sensor::getPossibleStates()
 {
     std::vector<std::string> labels;
+    labels.reserve(possibleStates_.size() + fixedStateLabels.size());
     for (const unsigned status : possibleStates_)
         labels.emplace_back(stateLabels[status]);
     appendTimes(labels, fixedStateLabels, ++fixedStateLabels_);

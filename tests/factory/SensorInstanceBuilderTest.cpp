@@ -246,6 +246,16 @@ TEST_F(SensorInstanceBuilderTest, ALongNameIsCutInCaptionButNotInName)
     EXPECT_EQ(property(instance, "Name"), "string \"" + name + "\"");
 }
 
+TEST_F(SensorInstanceBuilderTest, ALongNameOfAsciiIsCutAtTheSameLength)
+{
+    Sensor sensor = fullSensor();
+    for (const std::size_t length : {503, 504, 505, 600}) {
+        sensor.setElementName(std::string(length, 'x'));
+        EXPECT_EQ(property(make(sensor), "Caption"),
+            "string \"Sensor " + std::string(std::min<std::size_t>(length, 504), 'x') + "\"");
+    }
+}
+
 TEST_F(SensorInstanceBuilderTest, ExactlyAFull16BitCountOfLabelsIsNoProperty)
 {
     Sensor sensor = fullSensor();
