@@ -10,12 +10,6 @@
 
 namespace Host {
 
-namespace {
-
-thread_local Arena* currentArena = nullptr;
-
-} // namespace
-
 std::string_view Arena::text(std::string_view characters)
 {
     char* const copy = static_cast<char*>(memory_.allocate(characters.size() + 1, 1));
@@ -46,21 +40,14 @@ Arena::Name& Arena::findName(std::string_view characters)
     return names_.emplace(*made.text(), Name{&made}).first->second;
 }
 
-Arena* Arena::current() noexcept
+void Arena::refuse()
 {
-    return currentArena;
-}
-
-Arena& Arena::required()
-{
-    if (currentArena == nullptr)
-        throw Refusal(CMPI_RC_ERR_FAILED, "no request is active on this thread");
-    return *currentArena;
+    throw Refusal(CMPI_RC_ERR_FAILED, "no request is active on this thread");
 }
 
 Arena* Arena::makeCurrent(Arena* arena) noexcept
 {
-    return std::exchange(currentArena, arena);
+    return std::exchange(current_, arena);
 }
 
 } // namespace Host

@@ -16,6 +16,7 @@
 
 namespace Host {
 
+class PropertyFilter;
 class String;
 
 // Used by one thread at a time and without locks.
@@ -53,11 +54,19 @@ public:
     // request, such as the names of properties, classes and namespaces.
     const String& name(std::string_view characters);
 
+    // The filter that was set on an instance last; null before that.
+    PropertyFilter*& lastFilter() noexcept { return lastFilter_; }
+
     // Returns the arena of this thread's current request; null when there is none.
-    static Arena* current() noexcept;
+    static Arena* current() noexcept { return current_; }
     // Returns the arena of this thread's current request. Throws Refusal (CMPI_RC_ERR_FAILED) when
     // there is none.
-    static Arena& required();
+    static Arena& required()
+    {
+        if (current_ == nullptr)
+            refuse();
+        return *current_;
+    }
     // Makes an arena (or none) the current one of this thread and returns the previous one.
     static Arena* makeCurrent(Arena* arena) noexcept;
 
@@ -70,11 +79,15 @@ private:
     };
 
     Name& findName(std::string_view characters);
+    [[noreturn]] static void refuse();
+
+    static inline constinit thread_local Arena* current_ = nullptr;
 
     LargeBlocks blocks_;
     std::pmr::monotonic_buffer_resource memory_{firstBlock, &blocks_};
     std::pmr::unordered_map<std::string_view, Name> names_{&memory_};
     Name* lastName_ = nullptr;
+    PropertyFilter* lastFilter_ = nullptr;
 };
 
 } // namespace Host

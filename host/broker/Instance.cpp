@@ -5,6 +5,7 @@
 #include "host/broker/ClassInformation.h"
 #include "host/broker/Names.h"
 #include "host/broker/ObjectPath.h"
+#include "host/broker/PropertyFilter.h"
 #include "host/broker/Slot.h"
 #include "host/broker/String.h"
 #include "host/broker/Types.h"
@@ -14,26 +15,6 @@
 namespace Host {
 
 namespace {
-
-using NameList = std::span<const String* const>;
-
-bool contains(NameList names, std::string_view name)
-{
-    return std::any_of(names.begin(), names.end(),
-        [name](const String* known) { return equalNames(*known->text(), name); });
-}
-
-// Copies a null-terminated list of texts; a null pointer is an empty list.
-NameList copied(Arena& arena, const char** names)
-{
-    std::size_t count = 0;
-    while (names != nullptr && names[count] != nullptr)
-        ++count;
-    auto* const copy = arena.makeArray<const String*>(count);
-    std::transform(
-        names, names + count, copy, [&arena](const char* name) { return &arena.name(name); });
-    return {copy, count};
-}
 
 void addKeyIfSet(ObjectPath& path, std::string_view name, const Value& value)
 {
@@ -75,12 +56,12 @@ ObjectPath& Instance::objectPath() const
     ObjectPath& path = path_->copiedTo(Arena::required());
     const auto* const known =
         classes_ == nullptr ? nullptr : classes_->keysOf(path.nameSpace(), path.className());
-    if (known == nullptr) {
-        for (const String* const name : keyNames_)
+    if (known == nullptr && filter_ != nullptr)
+        for (const String* const name : filter_->keys())
             if (const NamedValue* const key = properties_.find(*name->text()))
                 addKeyIfSet(path, *name->text(), key->value);
+    if (known == nullptr)
         return path;
-    }
     // The keys keep the order in which they were set, which is that of the provider's paths. Most
     // providers set them before all other properties, so that the search ends early.
     std::size_t missing = known->size();
@@ -100,16 +81,12 @@ Instance& Instance::copiedTo(Arena& arena) const
 {
     Instance& copy = make(arena, *path_, classes_);
     copy.properties_ = properties_.shared();
-    copy.isFiltered_ = isFiltered_;
-    copy.wanted_ = wanted_;
-    copy.keyNames_ = keyNames_;
+    copy.filter_ = filter_;
     return copy;
 }
 
-bool Instance::isKey(std::string_view name) const
+bool Instance::isKeyOfClass(std::string_view name) const
 {
-    if (contains(keyNames_, name))
-        return true;
     const auto* const known =
         classes_ == nullptr ? nullptr : classes_->keysOf(path_->nameSpace(), path_->className());
     return known != nullptr && std::any_of(known->begin(), known->end(),
@@ -118,16 +95,15 @@ bool Instance::isKey(std::string_view name) const
 
 bool Instance::isWanted(std::string_view name) const
 {
-    return !isFiltered_ || contains(wanted_, name) || isKey(name);
+    return filter_ == nullptr || !filter_->hasProperties() || filter_->lists(name) ||
+           isKeyOfClass(name);
 }
 
 void Instance::setPropertyFilter(const char** properties, const char** keys)
 {
     Arena& arena = Arena::required();
-    isFiltered_ = properties != nullptr;
-    wanted_ = copied(arena, properties);
-    keyNames_ = copied(arena, keys);
-    if (isFiltered_ && properties_.size() != 0)
+    filter_ = &PropertyFilter::of(arena, properties, keys);
+    if (filter_->hasProperties() && properties_.size() != 0)
         properties_.retain(
             arena, [this](const NamedValue& property) { return isWanted(*property.name->text()); });
 }

@@ -7,13 +7,13 @@
 #include "host/broker/NamedValues.h"
 #include "host/broker/Object.h"
 
-#include <span>
 #include <string_view>
 
 namespace Host {
 
 class ClassInformation;
 class ObjectPath;
+class PropertyFilter;
 
 class Instance : public Encapsulated<Instance, CMPIInstance, Object::Kind::instance> {
 public:
@@ -44,14 +44,13 @@ public:
 
 private:
     friend class Arena;
-    using Names = std::span<const String* const>;
 
     Instance(const ObjectPath& path, const ClassInformation* classes)
         : path_(&path), classes_(classes)
     {
     }
 
-    bool isKey(std::string_view name) const;
+    bool isKeyOfClass(std::string_view name) const;
     bool isWanted(std::string_view name) const;
     void setPropertyFilter(const char** properties, const char** keys);
     void setProviderProperty(const char* name, const CMPIValue* value, CMPIType type);
@@ -59,9 +58,7 @@ private:
     const ObjectPath* path_;
     const ClassInformation* classes_;
     NamedValues properties_;
-    bool isFiltered_ = false;
-    Names wanted_;   // by the filter
-    Names keyNames_; // according to the filter
+    PropertyFilter* filter_ = nullptr; // null where none was set
 };
 
 } // namespace Host

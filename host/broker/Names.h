@@ -17,6 +17,8 @@ constexpr bool equalNames(std::string_view a, std::string_view b) noexcept
 {
     if (a.size() != b.size())
         return false;
+    if (a == b) // most names are written as they are declared
+        return true;
     for (std::string_view::size_type i = 0; i < a.size(); ++i)
         if (foldCase(a[i]) != foldCase(b[i]))
             return false;

@@ -115,9 +115,18 @@ Value Value::real(CMPIType type, double value) noexcept
 
 Value Value::plain(const void* value, CMPIType type) noexcept
 {
-    if (type != CMPI_boolean)
-        return {type, value, plainSize(type)};
-    return boolean(read<CMPIBoolean>(value) != 0);
+    if (type == CMPI_boolean)
+        return boolean(read<CMPIBoolean>(value) != 0);
+    switch (plainSize(type)) { // a copy of a constant size is a single instruction
+    case 1:
+        return {type, value, 1};
+    case 2:
+        return {type, value, 2};
+    case 4:
+        return {type, value, 4};
+    default:
+        return {type, value, 8};
+    }
 }
 
 Value Value::null(CMPIType type) noexcept

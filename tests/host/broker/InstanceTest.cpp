@@ -168,6 +168,39 @@ TEST_F(InstanceTest, ALaterFilterReplacesTheEarlierOne)
     EXPECT_EQ(propertiesOf(made), "B=1");
 }
 
+TEST_F(InstanceTest, OneFilterServesInstancesWhosePropertiesAreSetInAnyOrder)
+{
+    for (const std::string_view order : {"KABCD", "DCBAK", "CKDBA", "AABBKKCC"}) {
+        CMPIInstance* const made = instance();
+        filter(made, {"D", "b", "A", "A"}, {"K"});
+        for (const char name : order)
+            set(made, std::string(1, name).c_str(), "1");
+        EXPECT_EQ(property(made, "C"), nullptr) << order;
+        for (const char name : order)
+            EXPECT_EQ(property(made, std::string(1, name).c_str()) != nullptr, name != 'C')
+                << order;
+    }
+}
+
+TEST_F(InstanceTest, FiltersOfSeveralInstancesStayApart)
+{
+    CMPIInstance* const first = instance();
+    filter(first, {"A"}, {"K"});
+    CMPIInstance* const second = instance();
+    filter(second, {"A", "B"}, {"K"});
+    CMPIInstance* const third = instance();
+    keyNames(third, {"L"});
+    CMPIInstance* const fourth = instance();
+    filter(fourth, {}, {"L"});
+    for (const char* const name : {"A", "B", "K", "L"})
+        for (CMPIInstance* const each : {first, second, third, fourth})
+            set(each, name, "1");
+    EXPECT_EQ(propertiesOf(first), "A=1,K=1");
+    EXPECT_EQ(propertiesOf(second), "A=1,B=1,K=1");
+    EXPECT_EQ(propertiesOf(third), "A=1,B=1,K=1,L=1");
+    EXPECT_EQ(propertiesOf(fourth), "L=1");
+}
+
 TEST_F(InstanceTest, WithoutKeyNamesThePathIsAsGiven)
 {
     CMPIInstance* const made = instance();
