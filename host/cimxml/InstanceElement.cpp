@@ -72,8 +72,9 @@ std::size_t writeFrame(std::string& out, std::string_view name, CMPIType valueTy
 void writeValue(std::string& out, const Value& value)
 {
     if (isSingle(value)) {
-        const Markup element(out, "VALUE");
+        out += "<VALUE>"; // without Markup, since most elements of an answer are these
         writeContent(out, value);
+        out += "</VALUE>";
     } else if (const Array* const array = value.array()) {
         const Markup element(out, array->type() == CMPI_ref ? "VALUE.REFARRAY" : "VALUE.ARRAY");
         for (const Value& each : array->elements())

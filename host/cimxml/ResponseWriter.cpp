@@ -2,7 +2,6 @@
 
 #include "host/cimxml/ResponseWriter.h"
 
-#include "host/broker/Arena.h"
 #include "host/cimxml/ClassElement.h"
 #include "host/cimxml/InstanceElement.h"
 #include "host/cimxml/Markup.h"
@@ -12,20 +11,6 @@
 namespace Host::CimXml {
 
 namespace {
-
-// Makes an arena of its own current, so that the path which an instance makes is not kept with the
-// request.
-class ScratchArena {
-public:
-    ScratchArena() : before_(Arena::makeCurrent(&arena_)) {}
-    ~ScratchArena() { Arena::makeCurrent(before_); }
-    ScratchArena(const ScratchArena&) = delete;
-    ScratchArena& operator=(const ScratchArena&) = delete;
-
-private:
-    Arena arena_;
-    Arena* before_;
-};
 
 std::string_view responseName(bool isIntrinsic)
 {
@@ -98,7 +83,6 @@ void ResponseWriter::begin(std::string& out) const
 
 void ResponseWriter::instance(std::string& out, const Instance& instance)
 {
-    const ScratchArena scratch;
     const ObjectPath& path = instance.objectPath();
     const std::string_view nameSpace =
         path.nameSpace().empty() ? std::string_view(location_.nameSpace) : path.nameSpace();

@@ -34,6 +34,7 @@ public:
 
     void begin(std::string& out) const;
 
+    // REQUIRES: the thread has a current arena, in which the path of the instance is made.
     void instance(std::string& out, const Instance& instance);
     void path(std::string& out, const ObjectPath& path) const;
     void classDeclaration(std::string& out, const ClassDeclaration& declared) const;

@@ -2,6 +2,8 @@
 
 #include "host/operations/ObjectResponse.h"
 
+#include "host/broker/Arena.h"
+
 #include <utility>
 #include <variant>
 
@@ -11,6 +13,20 @@ namespace {
 
 // The size of a piece, to which the last object in it adds.
 constexpr std::size_t portion = std::size_t{16} * 1024;
+
+// Makes an arena of its own current, so that the paths which instances make are not kept with the
+// request.
+class ScratchArena {
+public:
+    ScratchArena() : before_(Arena::makeCurrent(&arena_)) {}
+    ~ScratchArena() { Arena::makeCurrent(before_); }
+    ScratchArena(const ScratchArena&) = delete;
+    ScratchArena& operator=(const ScratchArena&) = delete;
+
+private:
+    Arena arena_;
+    Arena* before_;
+};
 
 // Appends an object as the writer does for its kind.
 struct Write {
@@ -45,6 +61,7 @@ bool ObjectResponse::append(std::string& out)
 {
     if (isFinished_)
         return false;
+    const ScratchArena scratch;
     const std::size_t enough = out.size() + portion;
     if (next_ == 0)
         writer_.begin(out);
