@@ -12,19 +12,28 @@ namespace Vorn::SensorProfileProvider {
 
 namespace {
 
-// The product has a significand of 64 bits and is truncated without rounding: 3.3 V become 3299 mV.
-// Rounding to double first would give 3300.
+// A long double holds the product of a reading and a multiplier whole.
 static_assert(std::numeric_limits<long double>::digits >= 64);
 
-template <typename Number>
-std::int32_t truncated(Number product)
+// Returns the exact product, truncated toward zero: 3.3 V become 3299 mV. The product that is
+// rounded to double would become 3300. Only where that is a whole number can it differ from the
+// exact one, whose conversion would have the x87 unit wait for changes of its rounding mode.
+std::int32_t truncatedProduct(double value, double multiplier)
 {
     constexpr std::int32_t outOfRange = std::numeric_limits<std::int32_t>::min();
-    constexpr Number above = 2147483648.0;
-    constexpr Number below = -2147483649.0;
-    if (product > below && product < above) // false for NaN
-        return static_cast<std::int32_t>(product);
-    return outOfRange;
+    const double product = value * multiplier;
+    if (!(product >= -2147483649.0 && product <= 2147483648.0)) // also NaN
+        return outOfRange;
+    auto whole = static_cast<std::int64_t>(product);
+    if (multiplier != 1.0 && static_cast<double>(whole) == product) {
+        const long double exact = static_cast<long double>(value) * multiplier;
+        if (whole > 0 && exact < static_cast<long double>(whole))
+            --whole;
+        else if (whole < 0 && exact > static_cast<long double>(whole))
+            ++whole;
+    }
+    const auto narrowed = static_cast<std::int32_t>(whole);
+    return narrowed == whole ? narrowed : outOfRange;
 }
 
 template <typename Element, typename List>
@@ -165,9 +174,7 @@ bool Sensor::setPossibleStates(const std::vector<unsigned>& nodeStatuses)
 
 bool Sensor::storeScaled(std::int32_t& field, double value) const
 {
-    field = readingMultiplier_ == 1.0 // the common case, several times as fast
-                ? truncated(value)
-                : truncated(static_cast<long double>(value) * readingMultiplier_);
+    field = truncatedProduct(value, readingMultiplier_);
     return true;
 }
 

@@ -42,7 +42,7 @@ auto attempt(const std::string& entry, SourceStep step, const Action& action)
     }
 }
 
-std::optional<double> numberOf(const NodeReading& reading, Properties property)
+const std::optional<double>& numberOf(const NodeReading& reading, Properties property)
 {
     switch (property) {
     case Properties::Reading:
@@ -63,7 +63,8 @@ std::optional<double> numberOf(const NodeReading& reading, Properties property)
     case Properties::PossibleStates:
         break;
     }
-    return std::nullopt;
+    static constexpr std::optional<double> none;
+    return none;
 }
 
 template <typename Value>
@@ -97,7 +98,8 @@ struct Instrumentation::State {
     static bool haveNodes(const std::vector<OpenSource*>& listed);
     bool isOnNode() const { return place < sources.size(); }
     const Node& node() const { return sources.at(place).nodes[index]; }
-    const NodeReading& visit();
+    const NodeReading& visit() { return reading != nullptr ? *reading : readNode(); }
+    const NodeReading& readNode();
 };
 
 Instrumentation::State::State()
@@ -175,10 +177,8 @@ void Instrumentation::State::passFinishedSources()
         FailureLog::instance().succeeded(sources[place].entry, {SourceStep::Stage::Reading, type});
 }
 
-const NodeReading& Instrumentation::State::visit()
+const NodeReading& Instrumentation::State::readNode()
 {
-    if (reading != nullptr)
-        return *reading;
     const Node& visited = node();
     const OpenSource& open = sources[place];
     try {
