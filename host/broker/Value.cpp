@@ -13,18 +13,6 @@
 
 namespace Host {
 
-namespace {
-
-template <typename T>
-T read(const void* value) noexcept
-{
-    T result;
-    std::memcpy(&result, value, sizeof result);
-    return result;
-}
-
-} // namespace
-
 Value::Value(CMPIType type, const void* bits, std::size_t size) noexcept
     : type_(type), state_(CMPI_goodValue)
 {
@@ -34,12 +22,6 @@ Value::Value(CMPIType type, const void* bits, std::size_t size) noexcept
 Value Value::ofHandle(CMPIType type, const void* handle) noexcept
 {
     return {type, &handle, sizeof handle};
-}
-
-template <typename T>
-T Value::get() const noexcept
-{
-    return read<T>(&bits_);
 }
 
 template <typename Self>
@@ -115,8 +97,11 @@ Value Value::real(CMPIType type, double value) noexcept
 
 Value Value::plain(const void* value, CMPIType type) noexcept
 {
-    if (type == CMPI_boolean)
-        return boolean(read<CMPIBoolean>(value) != 0);
+    if (type == CMPI_boolean) {
+        CMPIBoolean truth = 0;
+        std::memcpy(&truth, value, sizeof truth);
+        return boolean(truth != 0);
+    }
     switch (plainSize(type)) { // a copy of a constant size is a single instruction
     case 1:
         return {type, value, 1};
@@ -154,43 +139,6 @@ std::optional<bool> Value::boolean() const noexcept
     if (isNull() || type_ != CMPI_boolean)
         return std::nullopt;
     return get<CMPIBoolean>() != 0;
-}
-
-std::optional<std::uint64_t> Value::unsignedInteger() const noexcept
-{
-    if (isNull())
-        return std::nullopt;
-    switch (type_) {
-    case CMPI_uint8:
-        return get<CMPIUint8>();
-    case CMPI_uint16:
-    case CMPI_char16:
-        return get<CMPIUint16>();
-    case CMPI_uint32:
-        return get<CMPIUint32>();
-    case CMPI_uint64:
-        return get<CMPIUint64>();
-    default:
-        return std::nullopt;
-    }
-}
-
-std::optional<std::int64_t> Value::signedInteger() const noexcept
-{
-    if (isNull())
-        return std::nullopt;
-    switch (type_) {
-    case CMPI_sint8:
-        return get<CMPISint8>();
-    case CMPI_sint16:
-        return get<CMPISint16>();
-    case CMPI_sint32:
-        return get<CMPISint32>();
-    case CMPI_sint64:
-        return get<CMPISint64>();
-    default:
-        return std::nullopt;
-    }
 }
 
 std::optional<double> Value::real() const noexcept

@@ -7,6 +7,7 @@
 #include <cmpidt.h>
 
 #include <cstdint>
+#include <cstring>
 #include <optional>
 #include <string_view>
 
@@ -86,7 +87,12 @@ private:
     Value(CMPIType type, const void* bits, std::size_t size) noexcept;
     static Value ofHandle(CMPIType type, const void* handle) noexcept;
     template <typename T>
-    T get() const noexcept;
+    T get() const noexcept
+    {
+        T result;
+        std::memcpy(&result, &bits_, sizeof result);
+        return result;
+    }
     template <typename Self>
     const Self* object(CMPIType type) const noexcept;
 
@@ -94,5 +100,42 @@ private:
     CMPIValueState state_ = CMPI_nullValue;
     std::uint64_t bits_ = 0; // the first bytes of a CMPIValue
 };
+
+inline std::optional<std::uint64_t> Value::unsignedInteger() const noexcept
+{
+    if (isNull())
+        return std::nullopt;
+    switch (type_) {
+    case CMPI_uint8:
+        return get<CMPIUint8>();
+    case CMPI_uint16:
+    case CMPI_char16:
+        return get<CMPIUint16>();
+    case CMPI_uint32:
+        return get<CMPIUint32>();
+    case CMPI_uint64:
+        return get<CMPIUint64>();
+    default:
+        return std::nullopt;
+    }
+}
+
+inline std::optional<std::int64_t> Value::signedInteger() const noexcept
+{
+    if (isNull())
+        return std::nullopt;
+    switch (type_) {
+    case CMPI_sint8:
+        return get<CMPISint8>();
+    case CMPI_sint16:
+        return get<CMPISint16>();
+    case CMPI_sint32:
+        return get<CMPISint32>();
+    case CMPI_sint64:
+        return get<CMPISint64>();
+    default:
+        return std::nullopt;
+    }
+}
 
 } // namespace Host

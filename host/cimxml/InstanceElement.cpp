@@ -20,9 +20,9 @@ namespace {
 // Appends the content of VALUE.
 void writeContent(std::string& out, const Value& value)
 {
-    if (const Instance* const embedded = value.instance()) {
+    if (value.type() == CMPI_instance) {
         std::string text;
-        InstanceMarkup().write(text, *embedded, nullptr);
+        InstanceMarkup().write(text, *value.instance(), nullptr);
         appendEscaped(out, text);
     } else {
         appendLiteral(out, value);
