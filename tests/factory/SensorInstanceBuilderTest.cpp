@@ -249,7 +249,7 @@ TEST_F(SensorInstanceBuilderTest, ALongNameIsCutInCaptionButNotInName)
 TEST_F(SensorInstanceBuilderTest, ALongNameOfAsciiIsCutAtTheSameLength)
 {
     Sensor sensor = fullSensor();
-    for (const std::size_t length : {503, 504, 505, 600}) {
+    for (const std::size_t length : {503U, 504U, 505U, 600U}) {
         sensor.setElementName(std::string(length, 'x'));
         EXPECT_EQ(property(make(sensor), "Caption"),
             "string \"Sensor " + std::string(std::min<std::size_t>(length, 504), 'x') + "\"");

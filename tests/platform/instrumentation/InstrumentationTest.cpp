@@ -255,8 +255,8 @@ public:
 
 private:
     const std::vector<Vorn::Node> voltages_ = {{"/v", "V", 21, 0}};
-    const std::vector<Vorn::Node> none_;
-    const Vorn::NodeReading reading_;
+    const std::vector<Vorn::Node> none_ = {};
+    const Vorn::NodeReading reading_ = {};
 };
 
 TEST_F(FailureTest, OfOneSourceTakesNoNodesOfOthersAway)
