@@ -5,6 +5,8 @@
 
 #include "model/SensorHarvest.h"
 
+#include <cstdint>
+
 namespace Vorn::SensorProfileProvider {
 
 const std::string loggerSensorFactory = "Nimbrel.SensorFactory";
@@ -34,7 +36,10 @@ void SensorFactory::_createSensorMap()
 {
     const TracedOperation traced(factoryModule(), "_createSensorMap");
     traced.entering();
-    sensorMap = SensorIndex(vectSensor);
+    const auto count = static_cast<std::uint16_t>(vectSensor.size());
+    sensorMap.reserve(count);
+    for (std::uint16_t i = 0; i < count; ++i)
+        sensorMap.insert_or_assign(vectSensor[i].deviceID(), &vectSensor[i]);
     traced.exiting();
 }
 
@@ -42,8 +47,11 @@ void SensorFactory::_createEnabledLogicalElementCapMap()
 {
     const TracedOperation traced(factoryModule(), "_createEnabledLogicalElementCapMap");
     traced.entering();
-    for (SensorEnabledLogCap& capabilities : vectSensorEnabledLogCap)
+    const auto count = static_cast<std::uint16_t>(vectSensorEnabledLogCap.size());
+    for (std::uint16_t i = 0; i < count; ++i) {
+        SensorEnabledLogCap& capabilities = vectSensorEnabledLogCap[i];
         sensorEnabledLogCapMap.insert_or_assign(capabilities.getInstanceID(), capabilities);
+    }
     traced.exiting();
 }
 

@@ -3,14 +3,16 @@
 #pragma once
 
 #include "factory/RequestTexts.h"
-#include "factory/SensorIndex.h"
 #include "model/Sensor.h"
 #include "model/SensorEnabledLogCap.h"
 
 #include <cmpidt.h>
 
 #include <map>
+#include <memory_resource>
 #include <string>
+#include <string_view>
+#include <unordered_map>
 #include <vector>
 
 namespace Vorn::SensorProfileProvider {
@@ -107,11 +109,19 @@ private:
 
     const RequestTexts texts;
 
-    // The records in the order of the harvest, with duplicates, and those by their identifiers.
-    std::vector<Sensor> vectSensor;
-    SensorIndex sensorMap;
+    // Returns the records of sensorMap in the order of their identifiers.
+    std::vector<const Sensor*> sensorsInOrder() const;
+
+    std::vector<Sensor> vectSensor; // in the order of the harvest, with duplicates
     std::vector<SensorEnabledLogCap> vectSensorEnabledLogCap;
-    std::map<std::string, SensorEnabledLogCap> sensorEnabledLogCapMap;
+
+    // The records in vectSensor by their device identifiers; of duplicates, the last one. Most
+    // requests look for one sensor and need no order. Entries are removed all at once, so that they
+    // take their memory from a few blocks.
+    std::pmr::monotonic_buffer_resource sensorMapMemory;
+    std::pmr::unordered_map<std::string_view, const Sensor*> sensorMap{&sensorMapMemory};
+
+    std::map<std::string, SensorEnabledLogCap> sensorEnabledLogCapMap; // by instance identifier
 };
 
 } // namespace Vorn::SensorProfileProvider
