@@ -29,6 +29,7 @@
 #include "tests/support/Texts.h"
 #include "tools/serve/FreedMemory.h"
 
+#include <algorithm>
 #include <chrono>
 #include <cstdio>
 #include <cstdlib>
@@ -238,10 +239,8 @@ void printTable(int blocks)
     // sensorctl serve leaves out what is not set: with this list, the answers have equal content.
     const std::vector<std::string> names = propertiesIn(peers.front().bodyOf(getInstance()));
     const std::string list = propertyList(names);
-    std::vector<const char*> listed;
-    for (const std::string& name : names)
-        listed.push_back(name.c_str());
-    listed.push_back(nullptr);
+    std::vector<const char*> listed(names.size() + 1, nullptr);
+    std::transform(names.begin(), names.end(), listed.begin(), std::mem_fn(&std::string::c_str));
     const ProviderAlone alone;
     std::puts("| request | server | properties | ms | times sensorctl serve |\n"
               "|---|---|---|---|---|");
