@@ -32,7 +32,8 @@ public:
         int sensors() const { return temperatures + voltages + fans; }
     };
     static constexpr Design large = {"platform", 7, 7, 6};
-    static constexpr Design onPci = {"pci", 4, 0, 0}; // such as those of disks and network cards
+    // Such as those of disks and network cards: each tenth chip has a network interface.
+    static constexpr Design onPci = {"pci", 4, 0, 0};
 
     struct Chip {
         std::string folder;
@@ -74,6 +75,13 @@ private:
         std::filesystem::create_directories(folder_.path() / device);
         std::filesystem::create_symlink(
             std::string("../../bus/") + design_.bus, folder_.path() / device / "subsystem");
+        if (design_.bus == std::string("pci") && number % 10 == 0) {
+            const std::string name = "eth" + std::to_string(number);
+            std::filesystem::create_directories(folder_.path() / device / "net" / name);
+            std::filesystem::create_directories(folder_.path() / "net");
+            std::filesystem::create_symlink(
+                "../" + device + "/net/" + name, folder_.path() / "net" / name);
+        }
         const std::string folder = "hwmon/hwmon" + std::to_string(number) + "/";
         std::filesystem::create_directories(folder_.path() / folder);
         std::filesystem::create_symlink("../../" + device, folder_.path() / (folder + "device"));
