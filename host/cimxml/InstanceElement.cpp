@@ -72,9 +72,10 @@ std::size_t writeFrame(std::string& out, std::string_view name, CMPIType valueTy
 void writeValue(std::string& out, const Value& value)
 {
     if (isSingle(value)) {
-        out += "<VALUE>"; // without Markup, since most elements of an answer are these
+        // Most elements of an answer are these: without Markup, and with texts of known length.
+        out += std::string_view("<VALUE>");
         writeContent(out, value);
-        out += "</VALUE>";
+        out += std::string_view("</VALUE>");
     } else if (const Array* const array = value.array()) {
         const Markup element(out, array->type() == CMPI_ref ? "VALUE.REFARRAY" : "VALUE.ARRAY");
         for (const Value& each : array->elements())

@@ -21,16 +21,16 @@ public:
     {
         out_.append(1, '<').append(name_) += '>';
     }
-    ~Markup() { out_.append("</").append(name_) += '>'; }
+    ~Markup() { out_.append("</", 2).append(name_) += '>'; }
     Markup(const Markup&) = delete;
     Markup& operator=(const Markup&) = delete;
 
     Markup& attribute(std::string_view name, std::string_view value)
     {
         out_.back() = ' ';
-        out_.append(name).append("=\"");
+        out_.append(name).append("=\"", 2);
         appendEscaped(out_, value);
-        out_ += "\">";
+        out_.append("\">", 2);
         return *this;
     }
 
