@@ -8,6 +8,7 @@
 #include "platform/logging/PipeSignal.h"
 
 #include <array>
+#include <atomic>
 #include <exception>
 #include <string>
 #include <utility>
@@ -117,6 +118,9 @@ bool getSensorInstances(std::vector<Sensor>& vectSensor)
     const TracedOperation traced(
         module(), "getSensorInstances", [&] { return parameterList(" vectSensor=", &vectSensor); });
     traced.entering(HarvestLines::getSensorInstances.entry);
+    // A machine has as many sensors as at the last time, as a rule: the records need not be moved.
+    static std::atomic<std::size_t> expected = 0;
+    vectSensor.reserve(expected);
     bool nothing = true;
     for (const NodeType type : harvestedTypes) {
         try {
@@ -127,6 +131,7 @@ bool getSensorInstances(std::vector<Sensor>& vectSensor)
             RynLog::reportToStandardError(std::string(error.std::exception::what()) + '\n');
         }
     }
+    expected = vectSensor.size();
     traced.exiting(HarvestLines::getSensorInstances.exit);
     return nothing;
 }
