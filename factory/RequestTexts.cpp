@@ -23,10 +23,14 @@ constexpr std::wstring_view insert = L"%s";
 
 } // namespace
 
-RequestTexts::Format::Format(const std::wstring& text)
-    : wide(text), before(make_string(text.substr(0, text.find(insert)))),
-      after(make_string(text.substr(text.find(insert) + insert.size())))
+// The search compares character by character: valgrind reports wmemcmp(), which reads 32 bytes at
+// once.
+RequestTexts::Format::Format(const std::wstring& text) : wide(text)
 {
+    const auto at = std::search(text.begin(), text.end(), insert.begin(), insert.end());
+    before = make_string({text.begin(), at});
+    if (at != text.end())
+        after = make_string({at + insert.size(), text.end()});
 }
 
 RequestTexts::RequestTexts()
