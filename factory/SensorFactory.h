@@ -102,15 +102,14 @@ public:
 private:
     void _createSensorMap();
     void _createEnabledLogicalElementCapMap();
+    // Returns the records of sensorMap in the order of their identifiers.
+    std::vector<const Sensor*> sensorsInOrder() const;
     // Makes an instance as makeSensorInstance() does, and changes the record. The selection is that
     // of the properties for all instances of the request.
     CMPIInstance* makeInstance(const CMPIBroker* broker, const CMPIObjectPath* ref, Sensor& snsr,
         const char** properties, PropertySelection& selection, bool isObjPath, CMPIStatus* rc);
 
     const RequestTexts texts;
-
-    // Returns the records of sensorMap in the order of their identifiers.
-    std::vector<const Sensor*> sensorsInOrder() const;
 
     std::vector<Sensor> vectSensor; // in the order of the harvest, with duplicates
     std::vector<SensorEnabledLogCap> vectSensorEnabledLogCap;

@@ -16,8 +16,9 @@ namespace {
 static_assert(std::numeric_limits<long double>::digits >= 64);
 
 // Returns the exact product, truncated toward zero: 3.3 V become 3299 mV. The product that is
-// rounded to double would become 3300. Only where that is a whole number can it differ from the
-// exact one, whose conversion would have the x87 unit wait for changes of its rounding mode.
+// rounded to double would become 3300. Truncated, the two differ only where rounding made a whole
+// number. Everywhere else the exact product is not converted, since that makes the x87 unit wait
+// for changes of its rounding mode.
 std::int32_t truncatedProduct(double value, double multiplier)
 {
     constexpr std::int32_t outOfRange = std::numeric_limits<std::int32_t>::min();

@@ -118,12 +118,13 @@ bool getSensorInstances(std::vector<Sensor>& vectSensor)
     const TracedOperation traced(
         module(), "getSensorInstances", [&] { return parameterList(" vectSensor=", &vectSensor); });
     traced.entering(HarvestLines::getSensorInstances.entry);
-    // A machine has as many sensors as at the last time, as a rule: the records need not be moved.
+    // The number of sensors at the last time. Most machines have as many again, so that the records
+    // need not be moved.
     static std::atomic<std::size_t> expected = 0;
-    vectSensor.reserve(expected);
     bool nothing = true;
     for (const NodeType type : harvestedTypes) {
         try {
+            vectSensor.reserve(expected);
             if (harvestType(type, vectSensor))
                 nothing = false;
         } catch (const std::exception& error) {

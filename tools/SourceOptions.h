@@ -30,9 +30,8 @@ public:
     // and there are no other threads.
     void selectMachine() const;
 
-    // Throw std::runtime_error when no library is given and none is found. The second names the
-    // library of the sensors alone, which is all that sensors need: the other one takes long to
-    // load.
+    // Throw std::runtime_error when no library is given and none is found. The second leaves out the
+    // library of computer systems, which takes long to load and which sensors do not need.
     ProviderFiles providerFiles() const;
     ProviderFiles sensorProviderFile() const;
 

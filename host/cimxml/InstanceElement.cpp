@@ -72,7 +72,7 @@ std::size_t writeFrame(std::string& out, std::string_view name, CMPIType valueTy
 void writeValue(std::string& out, const Value& value)
 {
     if (isSingle(value)) {
-        // Most elements of an answer are these: without Markup, and with texts of known length.
+        // Most elements of an answer are written here. Markup would measure the name each time.
         out += std::string_view("<VALUE>");
         writeContent(out, value);
         out += std::string_view("</VALUE>");

@@ -17,9 +17,11 @@ using NodeLexicon::NodeType;
 
 namespace {
 
-// Whether a chip may take long, by the type that is read: whether one did at the last time. Drivers
-// may keep what they have read for a while, so that only the first type takes long.
-std::array<std::atomic<bool>, 3> mayBeSlow = {true, true, true};
+using Clock = std::chrono::steady_clock;
+
+// When a chip took long last, for each type of nodes. Drivers may keep what they have read for a
+// while, so that a chip which is slow takes long for the first type only, or for some requests.
+std::array<std::atomic<Clock::time_point>, 3> slowAt;
 
 std::size_t indexOf(NodeType type)
 {
@@ -51,14 +53,14 @@ const NodeReading& HwmonSource::read(const Node& node)
     return reading_ = reading ? std::move(*reading) : reader_->read(feature);
 }
 
-// Reads the nodes of the type, chip by chip: in this thread as long as the chips are fast, since
-// starting a thread takes as long as reading some of them. A further thread starts whenever no chip
-// was finished in an interval.
+// Reads the nodes of the type, chip by chip. Where no chip has taken long for a while, this thread
+// reads until one does, since starting a thread takes as long as reading some chips. A further
+// thread starts whenever no chip was finished in an interval.
 void HwmonSource::readAhead(NodeType type)
 {
     constexpr std::size_t maximumThreads = 16;
     constexpr auto interval = std::chrono::milliseconds(2);
-    using Clock = std::chrono::steady_clock;
+    constexpr auto memory = std::chrono::minutes(1); // of chips that took long
     ahead_.resize(catalogue_->features.size());
     std::atomic<std::size_t> next = 0;
     std::atomic<bool> isSlow = false; // whether a chip took longer
@@ -78,8 +80,8 @@ void HwmonSource::readAhead(NodeType type)
                 isSlow = true;
         }
     };
-    std::atomic<bool>& wasSlow = mayBeSlow.at(indexOf(type));
-    if (!wasSlow)
+    std::atomic<Clock::time_point>& lastSlow = slowAt.at(indexOf(type));
+    if (Clock::now() - lastSlow.load() > memory)
         readChips(true);
     // Where no thread can be started, get() reads the chips.
     std::vector<std::future<void>> threads;
@@ -94,7 +96,8 @@ void HwmonSource::readAhead(NodeType type)
     }
     for (auto& thread : threads)
         thread.get();
-    wasSlow = isSlow.load();
+    if (isSlow)
+        lastSlow = Clock::now();
 }
 
 } // namespace Vorn
