@@ -30,8 +30,8 @@ public:
     // and there are no other threads.
     void selectMachine() const;
 
-    // Throw std::runtime_error when no library is given and none is found. The second leaves out the
-    // library of computer systems, which takes long to load and which sensors do not need.
+    // Throw std::runtime_error when no library is given and none is found. The second leaves out
+    // the library of computer systems, which takes long to load and which sensors do not need.
     ProviderFiles providerFiles() const;
     ProviderFiles sensorProviderFile() const;
 
