@@ -12,7 +12,6 @@
 
 #include <algorithm>
 #include <exception>
-#include <functional>
 #include <map>
 #include <memory>
 #include <string_view>
@@ -65,20 +64,23 @@ Chips listChips(Vorn::Hwmon::ChipList::Clock::duration ageOfAttributes)
     }
 }
 
-using IsMissing = std::function<bool(const Vorn::Node&)>;
+using Identifiers = std::unordered_set<std::string_view>;
 
-// Returns whether the source can be listed and no node of it is missing.
-bool isUp(const Vorn::SourceEntry& entry, const Chips& chips, const IsMissing& isMissing)
+// Returns whether the source can be listed and the harvest has all its sensors.
+bool isUp(const Vorn::SourceEntry& entry, const Chips& chips, const Identifiers& harvested)
 {
+    const auto isHarvested = [&](const Vorn::Node& node) {
+        return harvested.contains(deviceIdOf(node.description, node.path));
+    };
     try {
         const auto source = Vorn::openSource(entry);
         if (entry.scheme == "hwmon") // the list of all types at once
             return chips != nullptr &&
-                   std::none_of(chips->features.begin(), chips->features.end(),
-                       [&](const auto& feature) { return isMissing(feature.node); });
+                   std::all_of(chips->features.begin(), chips->features.end(),
+                       [&](const auto& feature) { return isHarvested(feature.node); });
         for (const NodeType type : {NodeType::Temperature, NodeType::Voltage, NodeType::Tachometer})
             for (const Vorn::Node& node : source->nodes(type))
-                if (isMissing(node))
+                if (!isHarvested(node))
                     return false;
         return true;
     } catch (const std::exception&) {
@@ -86,36 +88,15 @@ bool isUp(const Vorn::SourceEntry& entry, const Chips& chips, const IsMissing& i
     }
 }
 
-std::map<std::string, bool> statesOfSources(const Chips& chips, const IsMissing& isMissing)
+std::map<std::string, bool> statesOfSources(const Chips& chips, const Identifiers& harvested)
 {
     std::map<std::string, bool> isUpByName;
     for (const Vorn::SourceEntry& entry : configuredSources()) {
         const std::string& name = entry.scheme == "hwmon" ? entry.scheme : entry.text;
         bool& areAllUp = isUpByName.try_emplace(name, true).first->second;
-        areAllUp = areAllUp && isUp(entry, chips, isMissing);
+        areAllUp = areAllUp && isUp(entry, chips, harvested);
     }
     return isUpByName;
-}
-
-// Lists the sources once more, since the provider returns no error where one cannot be read or
-// breaks off. Where they have as many sensors as the harvest, none is missing, and identifiers need
-// not be compared.
-std::map<std::string, bool> statesOfSources(const Sensors& sensors, const Chips& chips)
-{
-    std::size_t count = 0;
-    auto isUpBySource = statesOfSources(chips, [&](const Vorn::Node&) {
-        ++count;
-        return false;
-    });
-    if (count == sensors.size())
-        return isUpBySource;
-    std::unordered_set<std::string_view> harvested;
-    for (const Sensor& sensor : sensors)
-        harvested.insert(sensor.deviceId);
-    return statesOfSources(
-        chips ? listChips(std::chrono::seconds(0)) : nullptr, [&](const Vorn::Node& node) {
-            return !harvested.contains(deviceIdOf(node.description, node.path));
-        });
 }
 
 } // namespace
@@ -136,7 +117,15 @@ Harvest readHarvest(const Host::Manager& manager, ChipDevices& devices)
     const Chips chips = readsHwmon() ? listChips(anyAge) : nullptr;
     if (chips)
         devices.nameIn(harvest.sensors, chips->machine);
-    harvest.sources = statesOfSources(harvest.sensors, chips);
+    // The sources are listed once more, since the provider returns no error where one cannot be
+    // read or breaks off.
+    Identifiers harvested;
+    for (const Sensor& sensor : harvest.sensors)
+        harvested.insert(sensor.deviceId);
+    harvest.sources = statesOfSources(chips, harvested);
+    // An attribute that is gone may still be in this list of the chips.
+    if (chips && !harvest.lostSources().empty())
+        harvest.sources = statesOfSources(listChips(std::chrono::seconds(0)), harvested);
     harvest.duration = std::chrono::steady_clock::now() - begin;
     return harvest;
 }
