@@ -5,7 +5,6 @@
 #include "platform/instrumentation/hwmon/ChipList.h"
 
 #include <algorithm>
-#include <array>
 #include <atomic>
 #include <chrono>
 #include <future>
@@ -14,21 +13,6 @@
 namespace Vorn {
 
 using NodeLexicon::NodeType;
-
-namespace {
-
-using Clock = std::chrono::steady_clock;
-
-// When a chip took long last, for each type of nodes. Drivers may keep what they have read for a
-// while, so that a chip which is slow takes long for the first type only, or for some requests.
-std::array<std::atomic<Clock::time_point>, 3> slowAt;
-
-std::size_t indexOf(NodeType type)
-{
-    return static_cast<std::size_t>(type) - static_cast<std::size_t>(NodeType::Tachometer);
-}
-
-} // namespace
 
 const std::vector<Node>& HwmonSource::nodes(NodeType type)
 {
@@ -53,51 +37,37 @@ const NodeReading& HwmonSource::read(const Node& node)
     return reading_ = reading ? std::move(*reading) : reader_->read(feature);
 }
 
-// Reads the nodes of the type, chip by chip. Where no chip has taken long for a while, this thread
-// reads until one does, since starting a thread takes as long as reading some chips. A further
-// thread starts whenever no chip was finished in an interval.
+// Reads the nodes of the type, chip by chip. A further thread starts only when no chip was finished
+// in an interval: where all chips are fast, more threads would only cost time.
 void HwmonSource::readAhead(NodeType type)
 {
     constexpr std::size_t maximumThreads = 16;
     constexpr auto interval = std::chrono::milliseconds(2);
-    constexpr auto memory = std::chrono::minutes(1); // of chips that took long
     ahead_.resize(catalogue_->features.size());
     std::atomic<std::size_t> next = 0;
-    std::atomic<bool> isSlow = false; // whether a chip took longer
-    const auto readChips = [&](bool isUntilSlow) {
+    const auto readChips = [&] {
         const auto& features = catalogue_->features;
         Hwmon::NodeReader reader(catalogue_);
-        while (!(isUntilSlow && isSlow)) {
-            const std::size_t chip = next++;
-            if (chip >= catalogue_->chips.size())
-                break;
-            const auto begin = Clock::now();
+        for (std::size_t chip = next++; chip < catalogue_->chips.size(); chip = next++) {
             auto feature = std::ranges::lower_bound(features, chip, {}, &Hwmon::Feature::chip);
             for (; feature != features.end() && feature->chip == chip; ++feature)
                 if (feature->type == type)
                     ahead_[feature->node.token] = reader.read(*feature);
-            if (Clock::now() - begin > interval)
-                isSlow = true;
         }
     };
-    std::atomic<Clock::time_point>& lastSlow = slowAt.at(indexOf(type));
-    if (Clock::now() - lastSlow.load() > memory)
-        readChips(true);
     // Where no thread can be started, get() reads the chips.
     std::vector<std::future<void>> threads;
     bool isStuck = true;
     while (next < catalogue_->chips.size() && threads.size() < maximumThreads) {
         const std::size_t before = next;
         if (isStuck)
-            threads.push_back(std::async(readChips, false));
+            threads.push_back(std::async(readChips));
         if (threads.back().wait_for(interval) != std::future_status::timeout)
             break;
         isStuck = next <= before + 1; // a thread that started takes one chip at once
     }
     for (auto& thread : threads)
         thread.get();
-    if (isSlow)
-        lastSlow = Clock::now();
 }
 
 } // namespace Vorn

@@ -17,9 +17,8 @@ namespace Vorn {
 // meanwhile has status 13 and no properties.
 class HwmonSource final : public Source {
 public:
-    // In parallel, the reading of the first node reads all nodes of the listing. Where chips take
-    // long, it reads them in threads, which end before it returns, so that they do not delay each
-    // other; the first chip that takes long after a minute without one delays the others once.
+    // In parallel, all nodes of a listing are read when the first of them is, in threads that end
+    // with that call: a chip that takes long to be read does not delay the others.
     enum class Order { serial, parallel };
 
     explicit HwmonSource(Order order = Order::serial) : order_(order) {}
