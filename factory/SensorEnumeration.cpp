@@ -8,22 +8,7 @@
 #include "factory/SensorFactory.h"
 #include "factory/TraceLines.h"
 
-#include <algorithm>
-#include <utility>
-
 namespace Vorn::SensorProfileProvider {
-
-std::vector<const Sensor*> SensorFactory::sensorsInOrder() const
-{
-    std::vector<std::pair<std::string_view, const Sensor*>> byDeviceID(
-        sensorMap.begin(), sensorMap.end());
-    std::sort(byDeviceID.begin(), byDeviceID.end());
-    std::vector<const Sensor*> ordered;
-    ordered.reserve(byDeviceID.size());
-    for (const auto& [deviceID, sensor] : byDeviceID)
-        ordered.push_back(sensor);
-    return ordered;
-}
 
 int SensorFactory::getAllSensorCMPIInstances(const CMPIBroker* broker, const CMPIObjectPath* ref,
     const char** properties, bool isObjPath, std::vector<CMPIInstance*>& instances, CMPIStatus* rc)
@@ -36,7 +21,7 @@ int SensorFactory::getAllSensorCMPIInstances(const CMPIBroker* broker, const CMP
     traced.entering();
     PropertySelection selection(properties, isObjPath);
     Sensor copy; // keeps its memory from record to record
-    for (const Sensor* const sensor : sensorsInOrder()) {
+    for (const Sensor* const sensor : sensorMap.inOrder()) {
         copy = *sensor;
         instances.push_back(makeInstance(broker, ref, copy, properties, selection, isObjPath, rc));
     }
@@ -53,10 +38,10 @@ int SensorFactory::getOneSensorCMPIInstance(const CMPIBroker* broker, const CMPI
     });
     traced.entering();
     const char* const deviceID = charactersOf(key, rc);
-    const auto found = deviceID ? sensorMap.find(deviceID) : sensorMap.end();
-    if (found == sensorMap.end())
+    const Sensor* const found = deviceID ? sensorMap.find(deviceID) : nullptr;
+    if (found == nullptr)
         return 1; // without an exiting line
-    instances.push_back(makeSensorInstance(broker, ref, *found->second, properties, false, rc));
+    instances.push_back(makeSensorInstance(broker, ref, *found, properties, false, rc));
     traced.exiting();
     return 0;
 }
@@ -69,12 +54,12 @@ int SensorFactory::getAllSensorCMPIObjPaths(const CMPIBroker* broker, const CMPI
             " broker=", broker, " ref=", ref, " objectPaths=", &objectPaths, " status=", status);
     });
     traced.entering();
-    if (sensorMap.empty()) {
+    if (sensorMap.size() == 0) {
         traceToBroker(broker, CMPI_LEV_INFO, SensorProfileProvider, "***No instance found***");
         traced.exiting();
         return 1;
     }
-    for (const Sensor* const sensor : sensorsInOrder()) {
+    for (const Sensor* const sensor : sensorMap.inOrder()) {
         CMPIObjectPath* const path = newPath(broker, ref, SensorClass, texts.systemName(), status);
         if (path == nullptr) {
             reportFailure(broker, status, SensorProfileProvider, "Create CMPIObjectPath failed.",

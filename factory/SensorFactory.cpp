@@ -37,9 +37,7 @@ void SensorFactory::_createSensorMap()
     const TracedOperation traced(factoryModule(), "_createSensorMap");
     traced.entering();
     const auto count = static_cast<std::uint16_t>(vectSensor.size());
-    sensorMap.reserve(count);
-    for (std::uint16_t i = 0; i < count; ++i)
-        sensorMap.insert_or_assign(vectSensor[i].deviceID(), &vectSensor[i]);
+    sensorMap = SensorIndex({vectSensor.data(), count});
     traced.exiting();
 }
 

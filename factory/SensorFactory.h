@@ -3,16 +3,14 @@
 #pragma once
 
 #include "factory/RequestTexts.h"
+#include "factory/SensorIndex.h"
 #include "model/Sensor.h"
 #include "model/SensorEnabledLogCap.h"
 
 #include <cmpidt.h>
 
 #include <map>
-#include <memory_resource>
 #include <string>
-#include <string_view>
-#include <unordered_map>
 #include <vector>
 
 namespace Vorn::SensorProfileProvider {
@@ -102,8 +100,6 @@ public:
 private:
     void _createSensorMap();
     void _createEnabledLogicalElementCapMap();
-    // Returns the records of sensorMap in the order of their identifiers.
-    std::vector<const Sensor*> sensorsInOrder() const;
     // Makes an instance as makeSensorInstance() does, and changes the record. The selection is that
     // of the properties for all instances of the request.
     CMPIInstance* makeInstance(const CMPIBroker* broker, const CMPIObjectPath* ref, Sensor& snsr,
@@ -114,12 +110,7 @@ private:
     std::vector<Sensor> vectSensor; // in the order of the harvest, with duplicates
     std::vector<SensorEnabledLogCap> vectSensorEnabledLogCap;
 
-    // The records in vectSensor by their device identifiers; of duplicates, the last one. Most
-    // requests look for one sensor and need no order. Entries are removed all at once, so that they
-    // take their memory from a few blocks.
-    std::pmr::monotonic_buffer_resource sensorMapMemory;
-    std::pmr::unordered_map<std::string_view, const Sensor*> sensorMap{&sensorMapMemory};
-
+    SensorIndex sensorMap; // of the records in vectSensor
     std::map<std::string, SensorEnabledLogCap> sensorEnabledLogCapMap; // by instance identifier
 };
 
