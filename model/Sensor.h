@@ -24,7 +24,7 @@ namespace Vorn::SensorProfileProvider {
 // A value type for one thread. Functions throw only std::bad_alloc.
 class Sensor {
 public:
-    Sensor() = default;
+    Sensor();
 
     // The identifier as getDeviceID() returns it, valid until the record changes.
     std::string_view deviceID() const { return Text::trimmed(deviceID_, " \t"); }
@@ -111,5 +111,8 @@ private:
     std::int32_t lowerThresholdFatal_ = 0;
     std::int32_t upperThresholdFatal_ = 0;
 };
+
+// It is defined outside of the class, since a vector would write zeros first otherwise.
+inline Sensor::Sensor() = default;
 
 } // namespace Vorn::SensorProfileProvider

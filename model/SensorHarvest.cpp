@@ -101,6 +101,14 @@ void setProperties(Sensor& sensor, Instrumentation& node, std::vector<unsigned>&
         require(sensor.setBaseUnits(baseUnits), "Failed while setting Requested State");
 }
 
+void setRecord(Sensor& sensor, Instrumentation& node, std::vector<unsigned>& possibleStates)
+{
+    setIdentity(sensor, node);
+    setStatus(sensor, node.getNodeStatus());
+    require(sensor.setRequestedState(requestedEnabled), "Failed while setting Requested State");
+    setProperties(sensor, node, possibleStates);
+}
+
 // Returns whether there are nodes of the type. All of them are read.
 bool harvestType(NodeType type, std::vector<Sensor>& vectSensor)
 {
@@ -144,14 +152,14 @@ bool setVector(std::vector<Sensor>& vectSensor, Vorn::Instrumentation& instrumen
     });
     traced.entering(HarvestLines::setVector.entry);
     std::vector<unsigned> possibleStates;
-    while (instrumentation) {
-        Sensor sensor;
-        setIdentity(sensor, instrumentation);
-        setStatus(sensor, instrumentation.getNodeStatus());
-        require(sensor.setRequestedState(requestedEnabled), "Failed while setting Requested State");
-        setProperties(sensor, instrumentation, possibleStates);
-        vectSensor.push_back(std::move(sensor));
-        ++instrumentation;
+    for (; instrumentation; ++instrumentation) {
+        Sensor& sensor = vectSensor.emplace_back();
+        try {
+            setRecord(sensor, instrumentation, possibleStates);
+        } catch (...) {
+            vectSensor.pop_back();
+            throw;
+        }
     }
     traced.exiting(HarvestLines::setVector.exit);
     return false;
