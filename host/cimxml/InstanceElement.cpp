@@ -35,6 +35,21 @@ bool isSingle(const Value& value)
     return !value.isNull() && !isArrayType(value.type()) && value.type() != CMPI_ref;
 }
 
+// Appends VALUE for each element that is not null, with the markup between two in one piece.
+void writeElements(std::string& out, const Array& array)
+{
+    constexpr std::string_view first = "<VALUE>";
+    std::string_view before = first;
+    for (const Value& each : array.elements())
+        if (!each.isNull()) {
+            out += before;
+            writeContent(out, each);
+            before = "</VALUE><VALUE>";
+        }
+    if (before != first)
+        out += "</VALUE>";
+}
+
 // Appends the property's element with an empty VALUE where its value is a single one, else without
 // a value. Returns the offset at which the value is to be inserted.
 std::size_t writeFrame(std::string& out, std::string_view name, CMPIType valueType, bool hasSingle,
@@ -78,8 +93,11 @@ void writeValue(std::string& out, const Value& value)
         out += std::string_view("</VALUE>");
     } else if (const Array* const array = value.array()) {
         const Markup element(out, array->type() == CMPI_ref ? "VALUE.REFARRAY" : "VALUE.ARRAY");
-        for (const Value& each : array->elements())
-            writeValue(out, each);
+        if (array->type() == CMPI_ref)
+            for (const Value& each : array->elements())
+                writeValue(out, each);
+        else
+            writeElements(out, *array);
     } else if (const ObjectPath* const reference = value.path()) {
         writeReference(out, *reference);
     }
@@ -96,28 +114,43 @@ void InstanceMarkup::write(
     element.attribute("CLASSNAME", instance.className());
     if (declared != nullptr)
         writeQualifiers(out, declared->qualifiers, selection_);
+    // The end of a frame is written together with the beginning of the next one.
+    std::size_t written = 0;
+    std::size_t end = 0;
+    const auto writeUntil = [&](const Frame& frame, std::size_t place) {
+        if (frame.begin != end) {
+            out.append(markup_, written, end - written);
+            written = frame.begin;
+        }
+        out.append(markup_, written, place - written);
+        written = place;
+        end = frame.end;
+    };
     for (const auto& [name, value] : instance.properties()) {
         const Frame& frame = frameFor(*name->text(), value);
-        if (frame.text.empty())
+        if (frame.begin == frame.end)
             continue;
-        out.append(frame.text, 0, frame.valueAt);
+        writeUntil(frame, frame.valueAt);
         if (frame.isSingle)
             writeContent(out, value);
         else
             writeValue(out, value);
-        out.append(frame.text, frame.valueAt);
         if (frame.listedAt < listed_.size())
             isWritten_[frame.listedAt] = true;
     }
     for (std::size_t i = 0; i < listed_.size(); ++i)
-        if (!isWritten_[i])
-            out += frameFor(listed_[i], Value()).text;
+        if (!isWritten_[i]) {
+            const Frame& frame = frameFor(listed_[i], Value());
+            writeUntil(frame, frame.end);
+        }
+    out.append(markup_, written, end - written);
 }
 
 void InstanceMarkup::useClass(const ClassDeclaration* declared)
 {
     declared_ = declared;
     frames_.clear();
+    markup_.clear();
     listed_.clear();
     if (selection_.writesNulls && declared != nullptr)
         for (const auto& property : declared->properties)
@@ -138,10 +171,11 @@ const InstanceMarkup::Frame& InstanceMarkup::frameFor(std::string_view property,
     const auto listed = std::find_if(listed_.begin(), listed_.end(),
         [property](std::string_view name) { return equalNames(name, property); });
     Frame& frame = frames_.emplace_back(Frame{std::string(property), value.type(), isSingle(value),
-        {}, 0, static_cast<std::size_t>(listed - listed_.begin())});
+        markup_.size(), markup_.size(), 0, static_cast<std::size_t>(listed - listed_.begin())});
     if (isSelected(selection_, declared_, property))
-        frame.valueAt = writeFrame(
-            frame.text, property, frame.valueType, frame.isSingle, declared_, selection_);
+        frame.valueAt =
+            writeFrame(markup_, property, frame.valueType, frame.isSingle, declared_, selection_);
+    frame.end = markup_.size();
     return frame;
 }
 

@@ -32,13 +32,14 @@ public:
     void write(std::string& out, const Instance& instance, const ClassDeclaration* declared);
 
 private:
-    // The element of a property, without its value.
+    // The element of a property, without its value, in markup_.
     struct Frame {
         std::string property;
         CMPIType valueType = CMPI_null;
         bool isSingle = false; // the value is the content of one VALUE
-        std::string text;      // empty when the property is not selected
+        std::size_t begin = 0;
         std::size_t valueAt = 0;
+        std::size_t end = 0;      // equals the begin when the property is not selected
         std::size_t listedAt = 0; // in listed_; its size where the property is not in it
     };
 
@@ -48,6 +49,7 @@ private:
     ObjectSelection selection_;
     const ClassDeclaration* declared_ = nullptr;
     std::vector<Frame> frames_; // of that class
+    std::string markup_;        // of the frames, in their order
     std::size_t next_ = 0;      // where the search begins
 
     // The properties of the class that are nulls where an instance lacks them.

@@ -37,11 +37,16 @@ std::string_view valueTypeOf(const Value& value)
     return isNumber ? "numeric" : "string";
 }
 
-void writeKeyValue(std::string& out, const Value& value)
+// Appends the markup in few pieces, since each instance of an answer has several keys.
+void writeKey(std::string& out, std::string_view name, const Value& value)
 {
-    Markup element(out, "KEYVALUE");
-    element.attribute("VALUETYPE", valueTypeOf(value));
+    out += std::string_view("<KEYBINDING NAME=\"");
+    appendEscaped(out, name);
+    out += std::string_view("\"><KEYVALUE VALUETYPE=\"");
+    out += valueTypeOf(value);
+    out += std::string_view("\">");
     appendLiteral(out, value);
+    out += std::string_view("</KEYVALUE></KEYBINDING>");
 }
 
 } // namespace
@@ -51,14 +56,13 @@ void writeInstanceName(std::string& out, const ObjectPath& path)
     Markup name(out, "INSTANCENAME");
     name.attribute("CLASSNAME", path.className());
     for (const auto& [key, value] : path.keys()) {
-        if (value.isNull())
-            continue;
-        Markup binding(out, "KEYBINDING");
-        binding.attribute("NAME", *key->text());
-        if (const ObjectPath* const reference = value.path())
+        if (const ObjectPath* const reference = value.path()) {
+            Markup binding(out, "KEYBINDING");
+            binding.attribute("NAME", *key->text());
             writeReference(out, *reference);
-        else
-            writeKeyValue(out, value);
+        } else if (!value.isNull()) {
+            writeKey(out, *key->text(), value);
+        }
     }
 }
 
