@@ -2,12 +2,9 @@
 
 #include "host/operations/Selections.h"
 
-#include "host/broker/Names.h"
 #include "host/repository/Repository.h"
 
 #include <algorithm>
-#include <set>
-#include <string_view>
 
 namespace Host {
 
@@ -29,15 +26,6 @@ bool leavesOutSubclasses(const Operation& operation)
            !operation.deepInheritance;
 }
 
-// An order, since a client could make names whose hashes collide.
-struct NameOrder {
-    bool operator()(std::string_view a, std::string_view b) const
-    {
-        return std::lexicographical_compare(a.begin(), a.end(), b.begin(), b.end(),
-            [](char x, char y) { return foldCase(x) < foldCase(y); });
-    }
-};
-
 // Returns the names as the first class with such a property spells them, since providers may
 // compare letter case. Names that no class has are left out, and repeated names occur once: a
 // client's list may be as long as a request, and each instance is compared with it. All namespaces
@@ -45,20 +33,20 @@ struct NameOrder {
 std::vector<std::string> spelledAsDeclared(
     const Repository& classes, const std::vector<std::string>& names)
 {
-    std::set<std::string_view, NameOrder> wanted(names.begin(), names.end());
-    std::vector<std::string> spelled;
-    for (const auto& nameSpace : classes.namespaces())
-        for (const auto& declared : nameSpace->classes()) {
-            if (wanted.empty())
-                return spelled;
-            for (const auto& property : declared->properties)
-                // Inherited ones were seen already: classes come after those above them.
-                if (property->declaredIn == declared.get() && wanted.erase(property->name) != 0)
-                    spelled.push_back(property->name);
-        }
+    std::vector<const std::string*> declared; // no more than there are different properties
+    for (const std::string& name : names) {
+        const std::string* const found = classes.findPropertyName(name);
+        if (found != nullptr &&
+            std::find(declared.begin(), declared.end(), found) == declared.end())
+            declared.push_back(found);
+    }
     // Providers may treat an empty list as no list and return all properties.
-    if (spelled.empty() && !names.empty())
-        spelled.push_back(names.front());
+    if (declared.empty() && !names.empty())
+        declared.push_back(&names.front());
+    std::vector<std::string> spelled;
+    spelled.reserve(declared.size());
+    for (const std::string* const name : declared)
+        spelled.push_back(*name);
     return spelled;
 }
 

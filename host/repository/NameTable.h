@@ -7,7 +7,7 @@
 #include "host/broker/Names.h"
 
 #include <cstddef>
-#include <functional>
+#include <cstdint>
 #include <string>
 #include <string_view>
 #include <unordered_map>
@@ -18,10 +18,10 @@ struct NameHash {
     using is_transparent = void;
     std::size_t operator()(std::string_view name) const
     {
-        std::string folded(name);
-        for (char& c : folded)
-            c = foldCase(c);
-        return std::hash<std::string>()(folded);
+        std::uint64_t hash = 0xcbf29ce484222325; // FNV-1a
+        for (const char c : name)
+            hash = (hash ^ static_cast<unsigned char>(foldCase(c))) * 0x100000001b3;
+        return hash;
     }
 };
 

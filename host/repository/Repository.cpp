@@ -27,15 +27,28 @@ Repository::Repository(std::vector<std::unique_ptr<Namespace>> namespaces)
     : namespaces_(
           std::make_move_iterator(namespaces.begin()), std::make_move_iterator(namespaces.end()))
 {
+    for (const auto& nameSpace : namespaces_)
+        for (const auto& declared : nameSpace->classes())
+            for (const auto& property : declared->properties)
+                propertyNames_.try_emplace(property->name, &property->name);
 }
 
 const Namespace* Repository::findNamespace(std::string_view nameSpace) const
 {
+    for (const auto& each : namespaces_)
+        if (each->name() == nameSpace) // most are spelled as they are declared
+            return each.get();
     const std::string name = plainNamespaceName(nameSpace);
     for (const auto& each : namespaces_)
         if (equalNames(each->name(), name))
             return each.get();
     return nullptr;
+}
+
+const std::string* Repository::findPropertyName(std::string_view name) const
+{
+    const auto found = propertyNames_.find(name);
+    return found == propertyNames_.end() ? nullptr : found->second;
 }
 
 const ClassDeclaration* Repository::findClass(

@@ -5,6 +5,7 @@
 #pragma once
 
 #include "host/broker/ClassInformation.h"
+#include "host/repository/NameTable.h"
 #include "host/repository/Namespace.h"
 
 #include <memory>
@@ -32,6 +33,10 @@ public:
     const QualifierDeclaration* findQualifier(
         std::string_view nameSpace, std::string_view qualifierName) const;
 
+    // Returns the name of a property as the first class that has one of this name spells it.
+    // Returns null when no class of any namespace has one.
+    const std::string* findPropertyName(std::string_view name) const;
+
     enum class Depth { direct, deep };
 
     // Returns the subclasses of a class in the order of their declaration; with Depth::deep, each
@@ -49,6 +54,7 @@ public:
 
 private:
     std::vector<std::unique_ptr<const Namespace>> namespaces_;
+    NameTable<const std::string*> propertyNames_;
 };
 
 } // namespace Host
