@@ -46,6 +46,13 @@ Value copyOfArray(Arena& arena, const void* address, CMPIType type)
     return Value::of(array).copiedTo(arena);
 }
 
+// Returns the text of the string object whose handle is at the address. It is shared.
+Value textAt(const void* address)
+{
+    const auto* const handle = pointerAt<const CMPIString*>(address);
+    return handle == nullptr ? Value::null(CMPI_string) : Value::of(required<String>(handle));
+}
+
 Value copyOfText(Arena& arena, const char* text)
 {
     return text == nullptr ? Value::null(CMPI_string) : Value::text(arena, text);
@@ -61,7 +68,7 @@ Value copyOf(Arena& arena, const void* address, CMPIType type)
     case CMPI_charsptr:
         return copyOfText(arena, pointerAt<const char*>(address));
     case CMPI_string:
-        return copyOfObject<String>(arena, address, type);
+        return textAt(address);
     case CMPI_dateTime:
         return copyOfObject<DateTime>(arena, address, type);
     case CMPI_ref:
