@@ -7,7 +7,8 @@
 build_packages=(
   g++ cmake ninja-build
   libcli11-dev libexpat1-dev libfmt-dev libncurses-dev libsensors-dev libspdlog-dev libutfcpp-dev
-  libjs-dygraphs libkainjow-mustache-dev nlohmann-json3-dev tao-pegtl-dev
+  libjs-dygraphs libkainjow-mustache-dev nlohmann-json3-dev
+  prometheus-cpp-dev tao-pegtl-dev
   libcrypt-dev libgnutls28-dev libmicrohttpd-dev libsystemd-dev zlib1g-dev
   pkg-config
 )
@@ -28,7 +29,7 @@ check_packages=(
 bench_packages=(
   "${build_packages[@]}"
   libbenchmark-dev
-  iproute2 lm-sensors prometheus-cpp-dev util-linux
+  iproute2 lm-sensors util-linux
 )
 
 # Packages whose programs are needed, but not the services that their installation starts.

@@ -275,7 +275,8 @@ TEST_F(RpmRootTest, NeedsTheLibrariesThatItLoads)
     const std::string missing = tryRpm("-i " + packages().files()).err;
     for (const std::string name : {"libfmt\\.so[^ ]*", "libsystemd\\.so[^ ]*", "/usr/bin/find"})
         EXPECT_THAT(missing, ContainsRegex("\t" + name + " is needed by sensor-profile-provider-"));
-    for (const std::string name : {"libmicrohttpd\\.so[^ ]*", "systemd"})
+    for (const std::string name :
+        {"libmicrohttpd\\.so[^ ]*", "libprometheus-cpp-core\\.so[^ ]*", "systemd"})
         EXPECT_THAT(missing, ContainsRegex("\t" + name + " is needed by sensor-profile-[0-9]"));
 }
 

@@ -11,7 +11,10 @@
 
 #include <gmock/gmock.h>
 
+#include <array>
 #include <chrono>
+#include <cstdio>
+#include <cstdlib>
 #include <optional>
 #include <thread>
 
@@ -42,6 +45,14 @@ std::string textOf(const Labeled& series)
     return text;
 }
 
+// Returns the number with 16 digits, which is what prometheus-cpp writes of it.
+double rounded(double number)
+{
+    std::array<char, 32> digits{};
+    std::snprintf(digits.data(), digits.size(), "%.16g", number);
+    return std::atof(digits.data());
+}
+
 void expectSame(const std::map<Labeled, double>& ours, const std::map<Labeled, double>& theirs)
 {
     EXPECT_FALSE(theirs.empty());
@@ -50,7 +61,7 @@ void expectSame(const std::map<Labeled, double>& ours, const std::map<Labeled, d
         if (found == ours.end())
             ADD_FAILURE() << "missing: " << textOf(series);
         else
-            EXPECT_EQ(found->second, value) << textOf(series);
+            EXPECT_EQ(found->second, rounded(value)) << textOf(series);
     }
     for (const auto& [series, value] : ours)
         EXPECT_TRUE(theirs.contains(series)) << "too many: " << textOf(series);

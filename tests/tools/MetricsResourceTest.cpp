@@ -33,10 +33,8 @@ TEST_F(MetricsResourceTest, EachScrapeAfterTheOtherHasAHarvestOfItsOwn)
 TEST_F(MetricsResourceTest, TextThatClientsHaveYetToFetchIsBounded)
 {
     const std::string large(std::size_t{25} << 20, 'x');
-    Tools::MetricsResource metrics(harvests_, [&](Exposition& exposition) {
-        exposition.begin({"large", "A large label."});
-        exposition.add(Tools::Labels().add("chip", "a"), "label", large, 1);
-    });
+    Tools::MetricsResource metrics(
+        harvests_, [&](Exposition& exposition) { exposition.append(large); });
     auto first = metrics.represent(head_);
     const auto second = metrics.represent(head_);
     try {

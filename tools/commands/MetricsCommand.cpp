@@ -45,7 +45,8 @@ public:
         const Harvest harvest =
             readHarvest(ProviderClient(source_.sensorProviderFile()).manager(), devices);
         Exposition exposition(ExpositionForm::text);
-        addHarvest(exposition, harvest);
+        SensorMetrics sensors(0); // once
+        addHarvest(exposition, harvest, sensors);
         if (compatible_ && readsHwmon())
             addHwmon(exposition);
         const std::string text = std::move(exposition).finish();

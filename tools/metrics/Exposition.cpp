@@ -4,11 +4,8 @@
 
 #include "platform/text/Utf8.h"
 
-#include <array>
-#include <charconv>
-#include <cmath>
-#include <cstdint>
-#include <utility>
+#include <prometheus/metric_family.h>
+#include <prometheus/text_serializer.h>
 
 namespace Tools {
 
@@ -16,81 +13,82 @@ namespace {
 
 constexpr std::string_view suffixOfCounters = "_total";
 
-void appendEscaped(std::string& out, std::string_view text, bool escapesQuotes)
+// Returns the family in the text format. Without series, this is its comments.
+std::string serialised(const MetricFamily& family, std::vector<prometheus::ClientMetric> metrics)
 {
-    for (const char character : text)
-        if (character == '\n')
-            out += "\\n";
-        else if (character == '\\' || (character == '"' && escapesQuotes))
-            (out += '\\') += character;
-        else
-            out += character;
+    const bool isCounter = family.type == MetricFamily::Type::counter;
+    std::vector<prometheus::MetricFamily> families(1);
+    families.front().name = family.name;
+    families.front().help = family.help;
+    families.front().type =
+        isCounter ? prometheus::MetricType::Counter : prometheus::MetricType::Gauge;
+    families.front().metric = std::move(metrics);
+    return prometheus::TextSerializer().Serialize(families);
+}
+
+prometheus::ClientMetric metricOf(const Series& series, MetricFamily::Type type)
+{
+    prometheus::ClientMetric metric;
+    metric.label.reserve(series.labels.all().size());
+    for (const auto& [name, value] : series.labels.all())
+        metric.label.push_back({name, value});
+    (type == MetricFamily::Type::counter ? metric.counter.value : metric.gauge.value) =
+        series.value;
+    return metric;
 }
 
 } // namespace
 
 Labels& Labels::add(std::string_view name, std::string_view value)
 {
-    (text_ += text_.empty() ? "" : ",").append(name) += "=\"";
-    appendEscaped(text_, Text::toValidUtf8(value), true);
-    text_ += '"';
+    all_.emplace_back(name, Text::toValidUtf8(value));
     return *this;
+}
+
+std::string linesOf(const MetricFamily& family, const std::vector<Series>& series)
+{
+    std::vector<prometheus::ClientMetric> metrics;
+    metrics.reserve(series.size());
+    for (const Series& each : series)
+        metrics.push_back(metricOf(each, family.type));
+    std::string text = serialised(family, std::move(metrics));
+    std::size_t comments = 0;
+    while (text.compare(comments, 1, "#") == 0)
+        comments = text.find('\n', comments) + 1;
+    text.erase(0, comments);
+    return text;
 }
 
 void Exposition::begin(const MetricFamily& family)
 {
-    name_ = family.name;
+    if (form_ == ExpositionForm::text) {
+        append(serialised(family, {}));
+        return;
+    }
     const bool isCounter = family.type == MetricFamily::Type::counter;
     // In OpenMetrics, only the series of a counter have the suffix.
-    std::string_view name = family.name;
-    if (isCounter && form_ == ExpositionForm::openMetrics)
-        name.remove_suffix(suffixOfCounters.size());
-    addComment("HELP", name, family.help);
-    addComment("TYPE", name, isCounter ? "counter" : "gauge");
-    if (!family.unit.empty() && form_ == ExpositionForm::openMetrics)
-        addComment("UNIT", name, family.unit);
+    std::string name(family.name);
+    name.resize(name.size() - (isCounter ? suffixOfCounters.size() : 0));
+    const auto comment = [&](std::string_view keyword, std::string_view text) {
+        text_.append("# ").append(keyword).append(" ").append(name).append(" ");
+        text_.append(text).append("\n");
+    };
+    comment("HELP", family.help);
+    comment("TYPE", isCounter ? "counter" : "gauge");
+    if (!family.unit.empty())
+        comment("UNIT", family.unit);
 }
 
-void Exposition::addComment(std::string_view keyword, std::string_view name, std::string_view text)
+void Exposition::add(const MetricFamily& family, const std::vector<Series>& series)
 {
-    text_.append("# ").append(keyword).append(" ").append(name) += ' ';
-    appendEscaped(text_, text, form_ == ExpositionForm::openMetrics);
-    text_ += '\n';
-}
-
-void Exposition::add(const Labels& labels, double value)
-{
-    text_ += name_;
-    if (!labels.text().empty())
-        text_.append("{").append(labels.text()) += '}';
-    addNumber(value);
-}
-
-void Exposition::add(
-    const Labels& labels, std::string_view name, std::string_view value, double number)
-{
-    text_.append(name_).append("{").append(labels.text()) += ',';
-    text_.append(name).append("=\"").append(value) += "\"}";
-    addNumber(number);
-}
-
-void Exposition::addNumber(double number)
-{
-    constexpr double greatestWhole = 1e15;
-    std::array<char, 32> digits{};
-    char* const end = digits.data() + digits.size();
-    // Most numbers are whole, and an integer takes less time.
-    const bool isWhole = std::abs(number) < greatestWhole && std::trunc(number) == number;
-    const auto written = isWhole
-                             ? std::to_chars(digits.data(), end, static_cast<std::int64_t>(number))
-                             : std::to_chars(digits.data(), end, number);
-    (text_ += ' ').append(digits.data(), written.ptr) += '\n';
+    begin(family);
+    append(linesOf(family, series));
 }
 
 std::string Exposition::finish() &&
 {
     if (form_ == ExpositionForm::openMetrics)
-        text_ += "# EOF\n";
+        append("# EOF\n");
     return std::move(text_);
 }
 

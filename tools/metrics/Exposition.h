@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// The text that Prometheus scrapes.
+// The text that Prometheus scrapes. prometheus-cpp serialises it.
 
 #pragma once
 
@@ -8,6 +8,8 @@
 #include <cstddef>
 #include <string>
 #include <string_view>
+#include <utility>
+#include <vector>
 
 namespace Tools {
 
@@ -16,28 +18,35 @@ enum class ExpositionForm {
     openMetrics, // OpenMetrics 1.0.0
 };
 
-// The labels of a series, as they are in both forms.
 class Labels {
 public:
     // Adds a label. Bytes of the value that are no UTF-8 become U+FFFD.
     Labels& add(std::string_view name, std::string_view value);
 
-    const std::string& text() const { return text_; } // with commas between them
+    const std::vector<std::pair<std::string, std::string>>& all() const { return all_; }
 
     auto operator<=>(const Labels&) const = default;
 
 private:
-    std::string text_;
+    std::vector<std::pair<std::string, std::string>> all_; // names and values
+};
+
+struct Series {
+    Labels labels;
+    double value;
 };
 
 struct MetricFamily {
     enum class Type { gauge, counter };
 
     std::string_view name; // that of a counter ends in "_total"
-    std::string_view help;
+    std::string_view help; // without backslashes, quotes and line feeds
     Type type = Type::gauge;
     std::string_view unit = {}; // the end of the name, if it is a unit
 };
+
+// Returns a line for each series, which is the same in both forms.
+std::string linesOf(const MetricFamily& family, const std::vector<Series>& series);
 
 class Exposition {
 public:
@@ -49,20 +58,17 @@ public:
 
     // Begins a family. REQUIRES: the exposition has no other one of the name.
     void begin(const MetricFamily& family);
+    // Adds lines of the family, or parts of them.
+    void append(std::string_view lines) { text_ += lines; }
 
-    // Add a series to the family, the second with one label more, whose value needs no escapes.
-    void add(const Labels& labels, double value);
-    void add(const Labels& labels, std::string_view name, std::string_view value, double number);
+    // Adds a whole family.
+    void add(const MetricFamily& family, const std::vector<Series>& series);
 
     // Returns the text.
     std::string finish() &&;
 
 private:
-    void addComment(std::string_view keyword, std::string_view name, std::string_view text);
-    void addNumber(double number);
-
     ExpositionForm form_;
-    std::string name_; // of the series
     std::string text_;
 };
 

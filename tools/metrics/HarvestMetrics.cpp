@@ -2,9 +2,10 @@
 
 #include "tools/metrics/HarvestMetrics.h"
 
-#include "tools/metrics/SensorMetrics.h"
-
 #include <algorithm>
+#include <string>
+#include <string_view>
+#include <vector>
 
 namespace Tools {
 
@@ -23,33 +24,34 @@ constexpr MetricFamily build{"sensor_profile_build_info", "Version of sensorctl;
 
 } // namespace
 
-void addHarvest(Exposition& exposition, const Harvest& harvest)
+void addHarvest(Exposition& exposition, const Harvest& harvest, SensorMetrics& sensors)
 {
-    addSensors(exposition, harvest.sensors);
-    exposition.begin(duration);
-    exposition.add({}, harvest.duration.count());
-    exposition.begin(counts);
+    sensors.addTo(exposition, harvest.sensors);
+    exposition.add(duration, {{{}, harvest.duration.count()}});
+    std::vector<Series> kinds;
     for (const std::string_view kind : sensorKinds)
-        exposition.add(Labels().add("kind", kind),
-            static_cast<double>(std::ranges::count(harvest.sensors, kind, &Sensor::kind)));
-    exposition.begin(sources);
+        kinds.push_back({Labels().add("kind", kind),
+            static_cast<double>(std::ranges::count(harvest.sensors, kind, &Sensor::kind))});
+    exposition.add(counts, kinds);
+    std::vector<Series> states;
     for (const auto& [source, isUp] : harvest.sources)
-        exposition.add(Labels().add("source", source), isUp ? 1 : 0);
-    exposition.begin(build);
-    exposition.add(Labels().add("version", SENSOR_PROFILE_VERSION), 1);
+        states.push_back({Labels().add("source", source), isUp ? 1.0 : 0.0});
+    exposition.add(sources, states);
+    exposition.add(build, {{Labels().add("version", SENSOR_PROFILE_VERSION), 1}});
 }
 
 void addResponses(Exposition& exposition, const Host::Http::ResponseCounts& answered)
 {
-    exposition.begin(responses);
+    std::vector<Series> series;
     for (const auto& [status, count] : answered.get())
-        exposition.add(Labels().add("code", std::to_string(status)), static_cast<double>(count));
+        series.push_back(
+            {Labels().add("code", std::to_string(status)), static_cast<double>(count)});
+    exposition.add(responses, series);
 }
 
 void addHeldObjects(Exposition& exposition, std::size_t objects)
 {
-    exposition.begin(held);
-    exposition.add({}, static_cast<double>(objects));
+    exposition.add(held, {{{}, static_cast<double>(objects)}});
 }
 
 } // namespace Tools

@@ -4,6 +4,7 @@
 
 #include "host/http/ResponseCounts.h"
 #include "tools/metrics/Exposition.h"
+#include "tools/metrics/SensorMetrics.h"
 #include "tools/sensors/Harvest.h"
 
 #include <cstddef>
@@ -12,7 +13,7 @@ namespace Tools {
 
 // Adds the sensors, the duration of their harvest, the states of its sources, and the version of
 // the tool.
-void addHarvest(Exposition& exposition, const Harvest& harvest);
+void addHarvest(Exposition& exposition, const Harvest& harvest, SensorMetrics& sensors);
 
 // Adds the numbers of HTTP responses.
 void addResponses(Exposition& exposition, const Host::Http::ResponseCounts& answered);

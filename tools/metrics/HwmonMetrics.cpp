@@ -179,10 +179,13 @@ public:
         for (const auto& [metric, family] : families_) {
             const std::string name = "node_hwmon_" + metric;
             const bool isCounter = metric.ends_with("_total");
-            exposition.begin(
-                {name, help, isCounter ? MetricFamily::Type::counter : MetricFamily::Type::gauge});
+            std::vector<Series> series;
+            series.reserve(family.size());
             for (const auto& [labels, value] : family)
-                exposition.add(labels, value);
+                series.push_back({labels, value});
+            exposition.add(
+                {name, help, isCounter ? MetricFamily::Type::counter : MetricFamily::Type::gauge},
+                series);
         }
     }
 

@@ -53,7 +53,7 @@ std::shared_ptr<const UnsentText> MetricsResource::write(ExpositionForm form)
     Exposition exposition(form, latestSize_ + latestSize_ / 64);
     auto harvest = harvests_.get();
     const std::size_t sensors = harvest->sensors.size();
-    addHarvest(exposition, *harvest);
+    addHarvest(exposition, *harvest, sensors_);
     harvest.reset();
     if (sensors >= largeAnswer)
         ::malloc_trim(0);

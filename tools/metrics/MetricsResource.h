@@ -5,6 +5,7 @@
 #include "host/http/Resource.h"
 #include "host/http/UnsentObjects.h"
 #include "tools/metrics/Exposition.h"
+#include "tools/metrics/SensorMetrics.h"
 #include "tools/sensors/Harvest.h"
 #include "tools/serve/SingleFlight.h"
 #include "tools/serve/UnsentText.h"
@@ -12,6 +13,7 @@
 #include <atomic>
 #include <cstddef>
 #include <functional>
+#include <memory>
 
 namespace Tools {
 
@@ -27,12 +29,16 @@ public:
     Host::Http::Representation represent(const Host::Http::RequestHead& head) override;
 
 private:
+    // The lines that are kept take 2.5 KiB for a sensor.
+    static constexpr std::size_t maximumKeptSensors = 10'000;
+
     std::shared_ptr<const UnsentText> write(ExpositionForm form);
 
     SingleFlight<Harvest>& harvests_;
     const std::function<void(Exposition&)> addMore_;
     Host::Http::UnsentObjects unsent_;
     std::atomic<std::size_t> latestSize_ = 0; // of a text, in bytes
+    SensorMetrics sensors_{maximumKeptSensors};
     SingleFlight<UnsentText> text_;
     SingleFlight<UnsentText> openMetrics_;
 };

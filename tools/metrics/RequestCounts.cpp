@@ -7,6 +7,7 @@
 #include "host/cimxml/RequestError.h"
 
 #include <array>
+#include <vector>
 
 namespace Tools {
 
@@ -71,11 +72,13 @@ void RequestCounts::count(std::string_view operation, std::string_view result)
 
 void RequestCounts::addTo(Exposition& exposition) const
 {
-    exposition.begin(requests);
-    const std::lock_guard lock(mutex_);
+    std::vector<Series> series;
+    std::unique_lock lock(mutex_);
     for (const auto& [key, count] : counts_)
-        exposition.add(Labels().add("operation", key.first).add("result", key.second),
-            static_cast<double>(count));
+        series.push_back({Labels().add("operation", key.first).add("result", key.second),
+            static_cast<double>(count)});
+    lock.unlock();
+    exposition.add(requests, series);
 }
 
 } // namespace Tools

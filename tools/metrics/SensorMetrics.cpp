@@ -3,8 +3,9 @@
 #include "tools/metrics/SensorMetrics.h"
 
 #include <algorithm>
-#include <array>
-#include <cstddef>
+#include <string_view>
+#include <tuple>
+#include <utility>
 
 namespace Tools {
 
@@ -31,9 +32,9 @@ constexpr std::array measures = {
         {"sensor_profile_limit_rpm", "Limit of the revolutions per minute of a fan.", gauge,
             "rpm"}}};
 
-constexpr MetricFamily states{"sensor_profile_state",
+constexpr MetricFamily stateFamily{"sensor_profile_state",
     "State of the sensor: 1 for the present one, 0 for the others that it can have."};
-constexpr MetricFamily health{"sensor_profile_health",
+constexpr MetricFamily healthFamily{"sensor_profile_health",
     "HealthState of the sensor (CIM_ManagedSystemElement): 0 unknown, 5 OK, 10 degraded, 15 minor "
     "failure, 20 major failure, 25 critical failure, 30 non-recoverable error."};
 
@@ -42,11 +43,6 @@ constexpr std::string_view lost = "Lost"; // a state that any sensor can have
 // In the order of limitKinds.
 constexpr std::array<std::string_view, limitKinds.size()> limitNames = {"lower_warning",
     "lower_critical", "lower_fatal", "upper_warning", "upper_critical", "upper_fatal"};
-
-struct LabeledSensor {
-    const Sensor& sensor;
-    Labels labels;
-};
 
 Labels labelsOf(const Sensor& sensor)
 {
@@ -62,6 +58,14 @@ bool isOf(const Measure& measure, const Sensor& sensor)
     return sensor.unit.empty() ? sensor.kind == measure.kind : sensor.unit == measure.symbol;
 }
 
+// Returns null for a sensor in another unit.
+const Measure* measureOf(const Sensor& sensor)
+{
+    const auto* const found = std::find_if(measures.begin(), measures.end(),
+        [&](const Measure& measure) { return isOf(measure, sensor); });
+    return found == measures.end() ? nullptr : found;
+}
+
 // Returns a word such as "Warning high" as the value of a label, "warning_high".
 std::string valueOf(std::string_view word)
 {
@@ -72,40 +76,134 @@ std::string valueOf(std::string_view word)
     return value;
 }
 
-void addStates(Exposition& exposition, const Sensor& sensor, const Labels& labels)
+// Returns the line of the reading up to its number.
+std::string readingOf(const Sensor& sensor, const Measure& measure)
+{
+    std::string line = linesOf(measure.reading, {{labelsOf(sensor), 0}});
+    line.erase(line.rfind(' '));
+    return line;
+}
+
+std::string limitsOf(const Sensor& sensor, const Measure& measure)
+{
+    const Labels labels = labelsOf(sensor);
+    std::vector<Series> series;
+    for (std::size_t i = 0; i < limitNames.size(); ++i)
+        if (const auto& limit = sensor.limits.at(i))
+            series.push_back({Labels(labels).add("limit", limitNames.at(i)), limit->number()});
+    return linesOf(measure.limit, series);
+}
+
+std::string statesOf(const Sensor& sensor)
 {
     std::vector<std::string_view> words = sensor.possibleStates;
     words.insert(words.end(), {lost, sensor.state.word});
+    const Labels labels = labelsOf(sensor);
+    std::vector<Series> series;
     for (auto word = words.begin(); word != words.end(); ++word)
         if (std::find(words.begin(), word, *word) == word)
-            exposition.add(labels, "state", valueOf(*word), *word == sensor.state.word ? 1 : 0);
+            series.push_back({Labels(labels).add("state", valueOf(*word)),
+                *word == sensor.state.word ? 1.0 : 0.0});
+    return linesOf(stateFamily, series);
+}
+
+std::string healthOf(const Sensor& sensor)
+{
+    return linesOf(healthFamily, {{labelsOf(sensor), static_cast<double>(sensor.health)}});
+}
+
+// Returns the lines of the measure's readings, in the order of the sensors, without labels.
+std::string numbersOf(const Sensors& sensors, const Measure& measure)
+{
+    std::vector<Series> numbers;
+    for (const Sensor& sensor : sensors)
+        if (sensor.reading && isOf(measure, sensor))
+            numbers.push_back({{}, sensor.reading->number()});
+    return linesOf(measure.reading, numbers);
+}
+
+// Returns what the lines of a sensor are made of.
+auto fieldsOf(const Sensor& sensor)
+{
+    return std::tie(sensor.deviceId, sensor.chip, sensor.device, sensor.label, sensor.kind,
+        sensor.unit, sensor.limits, sensor.state.word, sensor.possibleStates, sensor.health);
 }
 
 } // namespace
 
-void addSensors(Exposition& exposition, const Sensors& sensors)
+SensorMetrics::Lines::Lines(const Sensor& from) : sensor(from)
 {
-    std::vector<LabeledSensor> labeled;
-    labeled.reserve(sensors.size());
-    for (const Sensor& sensor : sensors)
-        labeled.push_back({sensor, labelsOf(sensor)});
+    for (const Part part : {reading, limits, states, health})
+        parts.at(part) = linesOf(from, part);
+}
+
+std::string SensorMetrics::linesOf(const Sensor& sensor, Part part)
+{
+    const Measure* const measure = measureOf(sensor);
+    switch (part) {
+    case reading:
+        return measure == nullptr ? "" : readingOf(sensor, *measure);
+    case limits:
+        return measure == nullptr ? "" : limitsOf(sensor, *measure);
+    case states:
+        return statesOf(sensor);
+    default:
+        return healthOf(sensor);
+    }
+}
+
+void SensorMetrics::addTo(Exposition& exposition, const Sensors& sensors)
+{
+    std::unique_lock lock(mutex_);
+    if (sensors.size() <= maximumKept_) {
+        renew(sensors);
+        write(exposition, sensors, kept_);
+        return;
+    }
+    kept_ = {};
+    lock.unlock();
+    write(exposition, sensors, {});
+}
+
+void SensorMetrics::renew(const Sensors& sensors)
+{
+    kept_.erase(kept_.begin() + std::min(sensors.size(), kept_.size()), kept_.end());
+    for (std::size_t i = 0; i < sensors.size(); ++i)
+        if (i == kept_.size())
+            kept_.emplace_back(sensors[i]);
+        else if (fieldsOf(kept_[i].sensor) != fieldsOf(sensors[i]))
+            kept_[i] = Lines(sensors[i]);
+}
+
+void SensorMetrics::write(
+    Exposition& exposition, const Sensors& sensors, std::span<const Lines> kept)
+{
+    std::string made;
+    const auto append = [&](std::size_t i, Part part) {
+        exposition.append(kept.empty() ? made = linesOf(sensors[i], part) : kept[i].parts.at(part));
+    };
     for (const Measure& measure : measures) {
         exposition.begin(measure.reading);
-        for (const auto& [sensor, labels] : labeled)
-            if (sensor.reading && isOf(measure, sensor))
-                exposition.add(labels, sensor.reading->number());
+        const std::string numbers = numbersOf(sensors, measure);
+        std::string_view rest = numbers;
+        for (std::size_t i = 0; i < sensors.size(); ++i)
+            if (sensors[i].reading && isOf(measure, sensors[i])) {
+                append(i, reading);
+                rest.remove_prefix(measure.reading.name.size());
+                exposition.append(rest.substr(0, rest.find('\n') + 1));
+                rest.remove_prefix(rest.find('\n') + 1);
+            }
         exposition.begin(measure.limit);
-        for (const auto& [sensor, labels] : labeled)
-            for (std::size_t i = 0; i < limitNames.size(); ++i)
-                if (const auto& limit = sensor.limits.at(i); limit && isOf(measure, sensor))
-                    exposition.add(labels, "limit", limitNames.at(i), limit->number());
+        for (std::size_t i = 0; i < sensors.size(); ++i)
+            if (isOf(measure, sensors[i]))
+                append(i, limits);
     }
-    exposition.begin(states);
-    for (const auto& [sensor, labels] : labeled)
-        addStates(exposition, sensor, labels);
-    exposition.begin(health);
-    for (const auto& [sensor, labels] : labeled)
-        exposition.add(labels, sensor.health);
+    exposition.begin(stateFamily);
+    for (std::size_t i = 0; i < sensors.size(); ++i)
+        append(i, states);
+    exposition.begin(healthFamily);
+    for (std::size_t i = 0; i < sensors.size(); ++i)
+        append(i, health);
 }
 
 } // namespace Tools

@@ -27,6 +27,8 @@ struct Quantity {
     std::int64_t value;
     std::int32_t modifier;
 
+    bool operator==(const Quantity&) const = default;
+
     double number() const;
     std::string text() const;    // in full, such as "12.096"
     std::string rounded() const; // to hundredths unless it is less than 1, such as "12.10"
