@@ -198,6 +198,18 @@ TEST_F(ServeProcessTest, JournalGetsThePriorityOfTheLastMessage)
     EXPECT_THAT(ended.err, testing::StartsWith("<3>sensorctl: model file /no/such/model: "));
 }
 
+TEST_F(ServeProcessTest, AllocatorKeepsManyBlocksUnlessTheUserConfiguresIt)
+{
+    const auto environmentOf = [](const ServerProcess& server) {
+        return contentOf("/proc/" + std::to_string(server.id()) + "/environ");
+    };
+    EXPECT_THAT(environmentOf(ServerProcess(withModel())),
+        HasSubstr("GLIBC_TUNABLES=glibc.malloc.tcache_count=2000"));
+    const std::string own = "glibc.malloc.tcache_count=9";
+    EXPECT_THAT(environmentOf(ServerProcess(withModel(), {{"GLIBC_TUNABLES", own}})),
+        HasSubstr("GLIBC_TUNABLES=" + own));
+}
+
 TEST_F(ServeProcessTest, UserIsNamed)
 {
     if (::geteuid() != 0)

@@ -7,6 +7,7 @@
 
 #include <CLI/CLI.hpp>
 
+#include <cstdlib>
 #include <utility>
 
 namespace Tools {
@@ -25,7 +26,14 @@ public:
     {
     }
 
-    ExitCode run(Output& /*out*/) override { executeProgram("sensorctl-serve", std::move(words_)); }
+    ExitCode run(Output& /*out*/) override
+    {
+        // Has each thread of the server keep that many freed blocks of a size, such as the texts of
+        // two thousand sensors: a GetInstance takes a tenth less. The allocator of glibc reads the
+        // variable when a program starts.
+        ::setenv("GLIBC_TUNABLES", "glibc.malloc.tcache_count=2000", 0);
+        executeProgram("sensorctl-serve", std::move(words_));
+    }
 
 private:
     std::vector<std::string> words_;
