@@ -42,14 +42,18 @@ void SensorHistory::add(
         return;
     advanceTo(slot);
     present_.clear();
-    for (const Sensor* const sensor : sensors) // before others are forgotten
+    std::size_t added = 0;
+    for (const Sensor* const sensor : sensors)
         if (const auto known = entries_.find(sensor->deviceId); known != entries_.end())
             known->second->lastSeen = slot;
+        else
+            ++added;
     const std::size_t maximum = std::min(maximumSensors, 2 * sensors.size() + 100);
+    makeRoom(added, maximum, slot);
     for (const Sensor* const sensor : sensors) {
         auto found = entries_.find(sensor->deviceId);
         if (found == entries_.end()) {
-            if (!makeRoom(maximum, slot))
+            if (entries_.size() >= maximum)
                 continue;
             found = entries_.emplace(sensor->deviceId, std::make_unique<Entry>()).first;
         }
@@ -67,20 +71,20 @@ bool SensorHistory::awaitsClock(Slot slot)
     return isBehind && std::chrono::steady_clock::now() < clockAwaited_;
 }
 
-// Forgets the sensor that is gone for the longest time where there are as many as the maximum.
-// Returns false where none is gone.
-bool SensorHistory::makeRoom(std::size_t maximum, Slot slot)
+// Forgets sensors last seen before the slot, longest ago first, as far as there would be more than
+// the maximum with the added ones.
+void SensorHistory::makeRoom(std::size_t added, std::size_t maximum, Slot slot)
 {
-    if (entries_.size() < maximum)
-        return true;
-    const auto oldest =
-        std::min_element(entries_.begin(), entries_.end(), [](const auto& one, const auto& other) {
-            return one.second->lastSeen < other.second->lastSeen;
-        });
-    if (oldest->second->lastSeen == slot)
-        return false;
-    entries_.erase(oldest);
-    return true;
+    if (entries_.size() + added <= maximum)
+        return;
+    std::vector<Entries::iterator> gone;
+    for (auto entry = entries_.begin(); entry != entries_.end(); ++entry)
+        if (entry->second->lastSeen < slot)
+            gone.push_back(entry);
+    std::ranges::sort(gone, {}, [](const auto& entry) { return entry->second->lastSeen; });
+    gone.resize(std::min(gone.size(), entries_.size() + added - maximum));
+    for (const auto& entry : gone)
+        entries_.erase(entry);
 }
 
 // Clears what is between the newest slot and this one; where the clock was set back, also the

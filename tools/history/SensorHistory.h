@@ -75,7 +75,7 @@ public:
 private:
     bool awaitsClock(Slot slot);
     void advanceTo(Slot slot);
-    bool makeRoom(std::size_t maximum, Slot slot);
+    void makeRoom(std::size_t added, std::size_t maximum, Slot slot);
 
     mutable std::shared_mutex mutex_;
     Entries entries_;
