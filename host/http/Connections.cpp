@@ -11,6 +11,7 @@
 
 #include <algorithm>
 #include <new>
+#include <tuple>
 #include <utility>
 
 namespace Host::Http {
@@ -25,6 +26,13 @@ bool hasClientFinished(int descriptor)
 {
     char next = 0;
     return ::recv(descriptor, &next, 1, MSG_PEEK | MSG_DONTWAIT) == 0;
+}
+
+// Returns whether the client has sent what the thread of the connection has yet to read.
+bool hasUnreadBytes(int descriptor)
+{
+    char next = 0;
+    return ::recv(descriptor, &next, 1, MSG_PEEK | MSG_DONTWAIT) > 0;
 }
 
 // Returns whether the client has closed the connection or its direction, even where some of what it
@@ -46,13 +54,14 @@ ClientConnection* Connections::add(
     int descriptor, const Address& client, std::shared_ptr<const Certificate> certificate)
 {
     std::unique_lock lock(mutex_);
-    const bool isRoomForAll =
-        makeRoomAmong([](const ClientConnection&) { return true; }, limits_.maximumConnections);
-    const bool isRoom =
-        isRoomForAll &&
+    // An address with too many makes room among its own.
+    const bool isRoomForAddress =
         makeRoomAmong([network = client.network()](
                           const ClientConnection& each) { return each.network == network; },
             limits_.maximumConnectionsPerAddress);
+    const bool isRoom =
+        isRoomForAddress &&
+        makeRoomAmong([](const ClientConnection&) { return true; }, limits_.maximumConnections);
     if (!isRoom) {
         const std::size_t count = all_.size();
         ::shutdown(descriptor, SHUT_RDWR);
@@ -61,7 +70,7 @@ ClientConnection* Connections::add(
             report({"add", "Connections", __LINE__},
                 "refused a connection from " + client.host() + ": there are " +
                     std::to_string(count) +
-                    (isRoomForAll ? ", too many of them from this address" : ""));
+                    (isRoomForAddress ? "" : ", too many of them from this address"));
         return nullptr;
     }
     ClientConnection& connection = all_.emplace_back(descriptor, client, std::move(certificate));
@@ -77,22 +86,23 @@ ClientConnection* Connections::add(
 template <typename Counts>
 bool Connections::makeRoomAmong(const Counts& counts, std::size_t maximum)
 {
-    std::size_t count = 0;
-    ClientConnection* oldest = nullptr;
-    for (ClientConnection& each : all_) {
-        if (each.isLeaving || !counts(each))
-            continue;
-        ++count;
-        const bool isIdle = each.phase == Phase::idle && each.hasFetched;
-        if (isIdle && (oldest == nullptr || each.deadline < oldest->deadline))
-            oldest = &each;
-    }
-    if (count < maximum)
+    std::vector<ClientConnection*> counted;
+    for (ClientConnection& each : all_)
+        if (!each.isLeaving && counts(each))
+            counted.push_back(&each);
+    if (counted.size() < maximum)
         return true;
-    if (oldest == nullptr)
+    std::erase_if(counted, [](const ClientConnection* each) {
+        return each->phase != Phase::idle || hasUnreadBytes(each->descriptor);
+    });
+    const auto found = std::min_element(counted.begin(), counted.end(),
+        [](const ClientConnection* first, const ClientConnection* second) {
+            return std::tie(first->use, first->deadline) < std::tie(second->use, second->deadline);
+        });
+    if (found == counted.end())
         return false;
-    oldest->isLeaving = true;
-    ::shutdown(oldest->descriptor, SHUT_RDWR);
+    (*found)->isLeaving = true;
+    ::shutdown((*found)->descriptor, SHUT_RDWR);
     return true;
 }
 
@@ -117,7 +127,10 @@ void Connections::enter(ClientConnection& connection, Phase phase)
     if (phase == Phase::idle && isShuttingDown_)
         ::shutdown(connection.descriptor, SHUT_RD);
     connection.phase = phase;
-    connection.hasFetched = connection.hasFetched || phase == Phase::fetching;
+    if (phase == Phase::fetching)
+        connection.use = Use::resources;
+    else if (phase != Phase::idle && connection.use == Use::nothing)
+        connection.use = Use::operations;
     const bool isLastPiece = isShuttingDown_ && connection.stream != nullptr;
     connection.deadline = Clock::now() + timeoutOf(isLastPiece ? Phase::receiving : phase);
 }

@@ -34,6 +34,13 @@ enum class Phase {
     fetching,  // the client fetches a resource or a piece of a stream
 };
 
+// What a client has used a connection for. To make room, idle ones are closed in this order.
+enum class Use {
+    nothing,
+    resources,  // as browsers and Prometheus do, which connect again
+    operations, // or requests that were refused
+};
+
 // An open connection. Connections owns it.
 struct ClientConnection {
     ClientConnection(
@@ -52,8 +59,8 @@ struct ClientConnection {
     Phase phase = Phase::idle;
     std::chrono::steady_clock::time_point deadline{};
     Stream* stream = nullptr; // of the answer
-    bool hasFetched = false;  // a resource, as browsers do, which connect again
-    bool isLeaving = false;   // closed to make room, and no longer counted
+    Use use = Use::nothing;
+    bool isLeaving = false; // closed to make room, and no longer counted
 
     // Used by the connection's thread only.
     std::string target; // of the request that arrives
@@ -107,8 +114,9 @@ private:
     // Returns what is to be logged.
     std::vector<std::string> closeOverdue();
     std::chrono::seconds timeoutOf(Phase phase) const;
-    // Returns whether there is room for one more connection of those that count, for which the one
-    // of them that has been idle the longest is closed where need be (RFC 9112, 9.5).
+    // Returns whether there is room for one more connection of those that count, for which an idle
+    // one of them is closed where need be (RFC 9112, 9.5): of those with the least use, the one
+    // that has been idle the longest. None is closed of which a request has arrived in part.
     template <typename Counts>
     bool makeRoomAmong(const Counts& counts, std::size_t maximum);
     bool exceedsLimitsOfStreams(const ClientConnection& connection) const;

@@ -5,9 +5,15 @@
 #include "host/http/Connections.h"
 #include "host/http/UnsentObjects.h"
 #include "host/http/WorkSlots.h"
+#include "platform/instrumentation/Descriptor.h"
 
 #include <gtest/gtest.h>
 
+#include <sys/socket.h>
+#include <unistd.h>
+
+#include <algorithm>
+#include <array>
 #include <atomic>
 #include <mutex>
 #include <thread>
@@ -17,29 +23,99 @@ namespace HttpTests {
 
 namespace {
 
+using Host::Http::ClientConnection;
+using Host::Http::Connections;
+using Host::Http::Phase;
+
+const Host::Http::Address someAddress("127.0.0.1", 0);
+
 TEST(ConnectionsTest, AreNotTooManyHoweverManyAddThem)
 {
     Host::Http::Limits limits;
     limits.maximumConnections = 20;
-    Host::Http::Connections connections(limits);
-    const Host::Http::Address client("127.0.0.1", 0);
+    Connections connections(limits);
     std::mutex mutex;
-    std::vector<Host::Http::ClientConnection*> added;
+    std::vector<ClientConnection*> added;
     std::vector<std::thread> threads;
     for (int i = 0; i < 4; ++i)
         threads.emplace_back([&] {
             for (int n = 0; n < 50; ++n)
-                if (auto* const connection = connections.add(-1, client, nullptr)) {
+                if (auto* const connection = connections.add(-1, someAddress, nullptr)) {
+                    connections.enter(*connection, Phase::receiving);
                     const std::lock_guard lock(mutex);
                     added.push_back(connection);
                 }
         });
     for (std::thread& thread : threads)
         thread.join();
-    EXPECT_EQ(added.size(), 20U);
+    // The request of one may have begun just after it made room for another one.
+    EXPECT_EQ(std::ranges::count(added, false, &ClientConnection::isLeaving), 20);
+    EXPECT_EQ(connections.add(-1, someAddress, nullptr), nullptr);
     for (auto* const connection : added)
         connections.remove(*connection);
-    EXPECT_NE(connections.add(-1, client, nullptr), nullptr);
+    EXPECT_NE(connections.add(-1, someAddress, nullptr), nullptr);
+}
+
+TEST(ConnectionsTest, MakeRoomFirstWhereTheyHadTheLeastUse)
+{
+    Host::Http::Limits limits;
+    limits.maximumConnections = 6;
+    Connections connections(limits);
+    const auto add = [&](const std::vector<Phase>& phases) {
+        ClientConnection* const connection = connections.add(-1, someAddress, nullptr);
+        for (const Phase phase : phases)
+            connections.enter(*connection, phase);
+        return connection;
+    };
+    const std::vector<Phase> operation{
+        Phase::receiving, Phase::working, Phase::answering, Phase::idle};
+    const auto* const operated = add(operation);
+    const auto* const operatedLater = add(operation);
+    const auto* const fetched =
+        add({Phase::receiving, Phase::working, Phase::fetching, Phase::idle});
+    const auto* const silent = add({});
+    const auto* const silentLater = add({});
+    const auto* const busy = add({Phase::receiving});
+    for (const auto* const each : {silent, silentLater, fetched, operated, operatedLater}) {
+        EXPECT_FALSE(each->isLeaving);
+        EXPECT_NE(add({Phase::receiving}), nullptr);
+        EXPECT_TRUE(each->isLeaving);
+    }
+    EXPECT_EQ(connections.add(-1, someAddress, nullptr), nullptr);
+    EXPECT_FALSE(busy->isLeaving);
+}
+
+TEST(ConnectionsTest, RequestThatHasYetToBeReadKeepsItsConnection)
+{
+    std::array<int, 2> sockets{};
+    ASSERT_EQ(::socketpair(AF_UNIX, SOCK_STREAM, 0, sockets.data()), 0);
+    const Vorn::Descriptor first(sockets[0]);
+    const Vorn::Descriptor second(sockets[1]);
+    Host::Http::Limits limits;
+    limits.maximumConnections = 1;
+    Connections connections(limits);
+    const auto* const added = connections.add(first.number(), someAddress, nullptr);
+    ASSERT_EQ(::write(second.number(), "P", 1), 1);
+    EXPECT_EQ(connections.add(-1, someAddress, nullptr), nullptr);
+    EXPECT_FALSE(added->isLeaving);
+    char byte = 0;
+    ASSERT_EQ(::read(first.number(), &byte, 1), 1);
+    EXPECT_NE(connections.add(-1, someAddress, nullptr), nullptr);
+    EXPECT_TRUE(added->isLeaving);
+}
+
+TEST(ConnectionsTest, AddressWithTooManyMakesRoomAmongItsOwn)
+{
+    Host::Http::Limits limits;
+    limits.maximumConnections = 3;
+    limits.maximumConnectionsPerAddress = 2;
+    Connections connections(limits);
+    const auto* const other = connections.add(-1, Host::Http::Address("127.0.0.2", 0), nullptr);
+    const auto* const first = connections.add(-1, someAddress, nullptr);
+    EXPECT_NE(connections.add(-1, someAddress, nullptr), nullptr);
+    EXPECT_NE(connections.add(-1, someAddress, nullptr), nullptr);
+    EXPECT_TRUE(first->isLeaving);
+    EXPECT_FALSE(other->isLeaving);
 }
 
 TEST(UnsentObjectsTest, AreBoundedButForOneAnswerThatIsAlone)

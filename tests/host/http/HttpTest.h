@@ -124,6 +124,21 @@ inline std::string post(const std::string& moreFields = "",
            "\r\n" + body;
 }
 
+// Sends the head of a request and waits until the server asks for the rest.
+inline void beginPost(HttpClient& client)
+{
+    client.send("POST /cimom HTTP/1.1\r\n" + usualFields +
+                lengthField(cimCall("EnumerateClasses")) + "Expect: 100-continue\r\n\r\n");
+    EXPECT_THAT(client.receiveSome(), testing::StartsWith("HTTP/1.1 100 "));
+}
+
+// Returns the status of the answer to such a request.
+inline int finishPost(HttpClient& client)
+{
+    client.send(cimCall("EnumerateClasses"));
+    return client.receive().status;
+}
+
 class HttpTest : public testing::Test {
 protected:
     void start(std::vector<Host::Http::Endpoint> endpoints = {{{"127.0.0.1", 0}}})

@@ -151,8 +151,7 @@ TEST_F(LimitsTest, ConnectionsOfOneAddressAreBounded)
     std::vector<HttpClient> clients;
     for (int i = 0; i < 3; ++i) {
         clients.push_back(connect());
-        clients.back().send(post());
-        EXPECT_EQ(clients.back().receive().status, 200);
+        beginPost(clients.back());
     }
     EXPECT_TRUE(connect().isClosed());
     EXPECT_TRUE(connect().isClosed());
@@ -174,12 +173,25 @@ TEST_F(LimitsTest, ConnectionsInAllAreBounded)
     std::vector<HttpClient> clients;
     for (int i = 0; i < 2; ++i) {
         clients.push_back(connect());
-        clients.back().send(post());
-        EXPECT_EQ(clients.back().receive().status, 200);
+        beginPost(clients.back());
     }
     EXPECT_TRUE(connect().isClosed());
-    clients.front().send(post());
-    EXPECT_EQ(clients.front().receive().status, 200);
+    EXPECT_EQ(finishPost(clients.front()), 200);
+}
+
+TEST_F(LimitsTest, ConnectionsWithoutARequestMakeRoom)
+{
+    limits.maximumConnections = 3;
+    start();
+    HttpClient begun = connect();
+    beginPost(begun);
+    HttpClient first = connect();
+    HttpClient second = connect();
+    EXPECT_EQ(ask(post()).status, 200);
+    EXPECT_TRUE(first.isClosed());
+    second.send(post());
+    EXPECT_EQ(second.receive().status, 200);
+    EXPECT_EQ(finishPost(begun), 200);
 }
 
 TEST_F(LimitsTest, AnswersThatNobodyFetchesLeaveRoomForNoMoreOfTheirKind)

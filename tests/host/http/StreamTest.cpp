@@ -214,27 +214,6 @@ TEST_F(StreamTest, HalfOfAllConnectionsStayFreeForOtherRequests)
     EXPECT_EQ(ask(request).status, 503);
 }
 
-TEST_F(StreamTest, ConnectionsThatBrowsersLeaveIdleMakeRoom)
-{
-    limits.maximumConnectionsPerAddress = 4;
-    start();
-    std::vector<HttpClient> clients;
-    for (int i = 0; i < 4; ++i) {
-        clients.push_back(connect());
-        clients.back().send(post());
-        EXPECT_EQ(clients.back().receive().status, 200);
-    }
-    const std::string getFile = "GET /file HTTP/1.1\r\nHost: localhost\r\n\r\n";
-    clients[2].send(getFile);
-    EXPECT_EQ(clients[2].receive().status, 200);
-    // The server may regard the connection as idle only some time after the answer has arrived.
-    EXPECT_TRUE(Testing::waitUntil(
-        [&] { return Testing::errorOf([&] { EXPECT_EQ(ask(post()).status, 200); }).empty(); }));
-    EXPECT_TRUE(clients[2].isClosed());
-    clients[0].send(post());
-    EXPECT_EQ(clients[0].receive().status, 200);
-}
-
 TEST_F(StreamTest, HeadOpensNone)
 {
     start();

@@ -131,12 +131,10 @@ TEST_F(TlsTest, ClientsThatAreTooManyEndBeforeTheHandshake)
     limits.maximumConnections = 1;
     start({{{"127.0.0.1", 0}, true}});
     TlsClient client(port);
-    for (int i = 0; i < 3; ++i) {
-        HttpClient refused = connect();
-        EXPECT_TRUE(refused.isClosed());
-        client.send(post());
-        EXPECT_EQ(client.receive().status, 200);
-    }
+    beginPost(client);
+    for (int i = 0; i < 3; ++i)
+        EXPECT_TRUE(connect().isClosed());
+    EXPECT_EQ(finishPost(client), 200);
 }
 
 TEST_F(TlsTest, RefusedClientsMayComeWhileCertificatesAreReplaced)
@@ -146,6 +144,7 @@ TEST_F(TlsTest, RefusedClientsMayComeWhileCertificatesAreReplaced)
     start({{{"127.0.0.1", 0}, true}});
     certificate.reset(); // a replaced certificate is freed when no connection uses it
     TlsClient client(port);
+    beginPost(client);
     std::jthread replacing([&](const std::stop_token& stop) {
         while (!stop.stop_requested())
             server->replaceCertificate(Certificate::read(file("one.crt"), file("one.key")));
@@ -158,8 +157,7 @@ TEST_F(TlsTest, RefusedClientsMayComeWhileCertificatesAreReplaced)
                 EXPECT_THROW(TlsClient{port}, std::runtime_error);
         });
     clients.clear();
-    client.send(post());
-    EXPECT_EQ(client.receive().status, 200);
+    EXPECT_EQ(finishPost(client), 200);
 }
 
 // Writing to them would raise SIGPIPE, which terminates a process that does not ignore it.
