@@ -2,6 +2,7 @@
 
 #pragma once
 
+#include <algorithm>
 #include <string_view>
 
 namespace Text {
@@ -11,10 +12,14 @@ inline constexpr std::string_view asciiBlanks = " \t\n\v\f\r";
 // Returns the text without the given characters at either end.
 constexpr std::string_view trimmed(std::string_view text, std::string_view blanks = asciiBlanks)
 {
-    const auto first = text.find_first_not_of(blanks);
-    if (first == std::string_view::npos)
-        return {};
-    return text.substr(first, text.find_last_not_of(blanks) - first + 1);
+    const auto isBlank = [blanks](char character) {
+        return std::find(blanks.begin(), blanks.end(), character) != blanks.end();
+    };
+    while (!text.empty() && isBlank(text.front()))
+        text.remove_prefix(1);
+    while (!text.empty() && isBlank(text.back()))
+        text.remove_suffix(1);
+    return text;
 }
 
 } // namespace Text
