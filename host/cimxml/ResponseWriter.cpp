@@ -83,15 +83,15 @@ void ResponseWriter::begin(std::string& out) const
 
 void ResponseWriter::instance(std::string& out, const Instance& instance)
 {
-    const ObjectPath& path = instance.objectPath();
     const std::string_view nameSpace =
-        path.nameSpace().empty() ? std::string_view(location_.nameSpace) : path.nameSpace();
+        instance.nameSpace().empty() ? std::string_view(location_.nameSpace) : instance.nameSpace();
     const ClassDeclaration* const declared = classes_.findClass(nameSpace, instance.className());
     const std::string_view wrapper = wrapperOf(kind_);
     if (wrapper.empty()) {
         instances_.write(out, instance, declared);
         return;
     }
+    const ObjectPath& path = instance.objectPath();
     const Markup element(out, wrapper);
     if (kind_ == OperationKind::enumerateInstances)
         writeInstanceName(out, path);
