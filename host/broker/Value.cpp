@@ -177,6 +177,13 @@ const Array* Value::array() const noexcept
     return isArrayType(type_) ? object<Array>(type_) : nullptr;
 }
 
+bool Value::operator==(const Value& other) const noexcept
+{
+    if (type_ != other.type_ || isNull() != other.isNull())
+        return false;
+    return isNull() || bits_ == other.bits_ || (type_ == CMPI_string && text() == other.text());
+}
+
 Value Value::copiedTo(Arena& arena) const
 {
     Value copy = *this;

@@ -71,6 +71,10 @@ public:
     const Instance* instance() const noexcept;
     const Array* array() const noexcept;
 
+    // Returns whether both are of the same type and null, equal texts, numbers or truth values, or
+    // the same object.
+    bool operator==(const Value& other) const noexcept;
+
     // Returns the value with copies of the path, instance or array that it refers to.
     Value copiedTo(Arena& arena) const;
 

@@ -127,12 +127,14 @@ void InstanceMarkup::write(
         end = frame.end;
     };
     for (const auto& [name, value] : instance.properties()) {
-        const Frame& frame = frameFor(*name->text(), value);
+        Frame& frame = frameFor(*name->text(), value);
         if (frame.begin == frame.end)
             continue;
         writeUntil(frame, frame.valueAt);
         if (frame.isSingle)
             writeContent(out, value);
+        else if (const Array* const array = value.array())
+            writeArray(out, *array, frame);
         else
             writeValue(out, value);
         if (frame.listedAt < listed_.size())
@@ -158,11 +160,25 @@ void InstanceMarkup::useClass(const ClassDeclaration* declared)
                 listed_.push_back(property->name);
 }
 
+void InstanceMarkup::writeArray(std::string& out, const Array& array, Frame& frame)
+{
+    const auto isSame = [&](const Array& last) {
+        return std::equal(last.elements().begin(), last.elements().end(), array.elements().begin(),
+            array.elements().end());
+    };
+    if (frame.array == nullptr || !isSame(*frame.array)) {
+        frame.arrayText.clear();
+        writeValue(frame.arrayText, Value::of(array));
+    }
+    frame.array = &array;
+    out += frame.arrayText;
+}
+
 // Instances of a class mostly have the same properties in the same order.
-const InstanceMarkup::Frame& InstanceMarkup::frameFor(std::string_view property, const Value& value)
+InstanceMarkup::Frame& InstanceMarkup::frameFor(std::string_view property, const Value& value)
 {
     for (std::size_t tried = 0; tried < frames_.size(); ++tried) {
-        const Frame& next = frames_[next_];
+        Frame& next = frames_[next_];
         next_ = next_ + 1 == frames_.size() ? 0 : next_ + 1;
         if (next.valueType == value.type() && next.isSingle == isSingle(value) &&
             next.property == property)
@@ -170,8 +186,9 @@ const InstanceMarkup::Frame& InstanceMarkup::frameFor(std::string_view property,
     }
     const auto listed = std::find_if(listed_.begin(), listed_.end(),
         [property](std::string_view name) { return equalNames(name, property); });
-    Frame& frame = frames_.emplace_back(Frame{std::string(property), value.type(), isSingle(value),
-        markup_.size(), markup_.size(), 0, static_cast<std::size_t>(listed - listed_.begin())});
+    Frame& frame = frames_.emplace_back(
+        Frame{std::string(property), value.type(), isSingle(value), markup_.size(), markup_.size(),
+            0, static_cast<std::size_t>(listed - listed_.begin()), nullptr, {}});
     if (isSelected(selection_, declared_, property))
         frame.valueAt =
             writeFrame(markup_, property, frame.valueType, frame.isSingle, declared_, selection_);

@@ -22,13 +22,15 @@ void writeValue(std::string& out, const Value& value);
 // Writes instances as INSTANCE with PROPERTY, PROPERTY.ARRAY or PROPERTY.REFERENCE for each
 // selected property that the instance has, in its order. Data that a value lacks, such as the type
 // of a null, is taken from the class. The markup around the values, which is the same in all
-// instances of a class, is cached, which takes a third of the time of writing it anew. Used by one
-// thread at a time.
+// instances of a class, is cached, which takes a third of the time of writing it anew. So is the
+// text of arrays, many of which are the same in consecutive instances. Used by one thread at a
+// time.
 class InstanceMarkup {
 public:
     explicit InstanceMarkup(ObjectSelection selection = {}) : selection_(std::move(selection)) {}
 
-    // The class is null where it is not known; else it must outlive the object.
+    // The class is null where it is not known; else it must outlive the object. The instance must
+    // live until the next one is written.
     void write(std::string& out, const Instance& instance, const ClassDeclaration* declared);
 
 private:
@@ -39,12 +41,15 @@ private:
         bool isSingle = false; // the value is the content of one VALUE
         std::size_t begin = 0;
         std::size_t valueAt = 0;
-        std::size_t end = 0;      // equals the begin when the property is not selected
-        std::size_t listedAt = 0; // in listed_; its size where the property is not in it
+        std::size_t end = 0;          // equals the begin when the property is not selected
+        std::size_t listedAt = 0;     // in listed_; its size where the property is not in it
+        const Array* array = nullptr; // the value that was written last
+        std::string arrayText;
     };
 
     void useClass(const ClassDeclaration* declared);
-    const Frame& frameFor(std::string_view property, const Value& value);
+    Frame& frameFor(std::string_view property, const Value& value);
+    static void writeArray(std::string& out, const Array& array, Frame& frame);
 
     ObjectSelection selection_;
     const ClassDeclaration* declared_ = nullptr;
