@@ -142,6 +142,15 @@ TEST_F(ResponseTest, WritesAnInstanceTheSameWhateverWasWrittenBefore)
             made.setProperty(name, value);
         return &made;
     };
+    const auto list = [this](CMPIType type, const std::vector<Value>& values) {
+        Host::Array& made =
+            Host::Array::make(request.arena(), type, static_cast<CMPICount>(values.size()));
+        for (std::size_t i = 0; i < values.size(); ++i)
+            made.set(static_cast<CMPICount>(i), values[i]);
+        return Value::of(made);
+    };
+    const Value otherText = Value::text(request.arena(), "b");
+    const Value noText = Value::null(CMPI_string);
     const std::vector<Host::Instance*> instances = {
         instanceWith({{"Name", text}, {"Index", number}}),
         instanceWith({{"Index", number}, {"Name", text}}),
@@ -149,18 +158,31 @@ TEST_F(ResponseTest, WritesAnInstanceTheSameWhateverWasWrittenBefore)
         instanceWith({}),
         instanceWith({{"name", text}, {"INDEX", Value()}}),
         instanceWith({{"Unknown", number}, {"Name", text}, {"Index", number}}),
+        instanceWith({{"List", list(CMPI_uint16, {number, number})}, {"Name", text}}),
+        instanceWith({{"List", list(CMPI_uint16, {number, number})}, {"Index", number}}),
+        instanceWith({{"List", list(CMPI_uint16, {number, Value::integer(CMPI_uint16, 8)})}}),
+        instanceWith({{"List", list(CMPI_uint16, {number})}}),
+        instanceWith({{"List", Value::null(CMPI_uint16A)}}),
+        instanceWith({{"List", list(CMPI_string, {text, otherText})}}),
+        instanceWith({{"List", list(CMPI_string, {Value::text(request.arena(), "a"), otherText})}}),
+        instanceWith({{"List", list(CMPI_string, {text, text})}}),
+        instanceWith({{"List", list(CMPI_string, {noText, text})}}),
+        instanceWith({{"List", list(CMPI_string, {noText, noText})}}),
     };
     Host::CimXml::ObjectSelection selection;
     selection.localOnly = true;
     selection.includeQualifiers = true;
     selection.includeClassOrigin = true;
-    InstanceMarkup writer(selection);
-    for (const Host::ClassDeclaration* const declared : {thing, gauge, thing, {}, gauge})
-        for (const Host::Instance* const each : instances) {
-            std::string out;
-            writer.write(out, *each, declared);
-            EXPECT_EQ(out, markupOf(*each, declared, selection));
-        }
+    for (const bool writesNulls : {false, true}) {
+        selection.writesNulls = writesNulls;
+        InstanceMarkup writer(selection);
+        for (const Host::ClassDeclaration* const declared : {thing, gauge, thing, {}, gauge})
+            for (const Host::Instance* const each : instances) {
+                std::string out;
+                writer.write(out, *each, declared);
+                EXPECT_EQ(out, markupOf(*each, declared, selection));
+            }
+    }
 }
 
 TEST_F(ResponseTest, WrapsPathsAndClassNamesAsTheOperationDoes)

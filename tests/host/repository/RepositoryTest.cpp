@@ -49,6 +49,13 @@ TEST_F(RepositoryTest, FindsClassesInAnyCaseAndSpellsThemAsDeclared)
     EXPECT_EQ(repository_->findNamespace(testNameSpace)->qualifiers().front()->name, "Abstract");
 }
 
+TEST_F(RepositoryTest, FindsNamesOfPropertiesOfAnyClass)
+{
+    EXPECT_EQ(*repository_->findPropertyName("ID"), "Id");
+    EXPECT_EQ(*repository_->findPropertyName("note"), "Note");
+    EXPECT_EQ(repository_->findPropertyName("Left"), nullptr);
+}
+
 TEST_F(RepositoryTest, ListsSubclassesDirectAndDeep)
 {
     EXPECT_THAT(names(repository_->subclasses(testNameSpace, "top", Depth::direct)),
