@@ -34,9 +34,13 @@ RequestTexts::Format::Format(const std::wstring& text) : wide(text)
 }
 
 RequestTexts::RequestTexts()
-    : library_(Locale::getResourceLibrary(resourceComponent, Locale::getLanguageId())),
-      caption_(ResourceString(library_, L"MSGID_SENSOR_CAPTION").text()),
-      description_(ResourceString(library_, L"MSGID_SENSOR_DESCRIPTION").text())
+    : RequestTexts(Locale::getResourceLibrary(resourceComponent, Locale::getLanguageId()))
+{
+}
+
+RequestTexts::RequestTexts(const std::wstring& library)
+    : caption_(ResourceString(library, L"MSGID_SENSOR_CAPTION").text()),
+      description_(ResourceString(library, L"MSGID_SENSOR_DESCRIPTION").text())
 {
 }
 

@@ -29,10 +29,10 @@ private:
         std::string after;
     };
 
+    explicit RequestTexts(const std::wstring& library);
     static std::string filledIn(const Format& format, const std::string& elementName);
 
     std::string systemName_ = getSystemName();
-    std::wstring library_; // of the texts
     Format caption_;
     Format description_;
 };
