@@ -94,7 +94,7 @@ std::vector<std::string> modelFiles()
 // does not start without a log. A running server continues when the log fails.
 void beginLog(const std::string& text, Output& out)
 {
-    report({"beginLog", "ServeCommand", __LINE__}, text, Severity::information);
+    report({"beginLog", "main", __LINE__}, text, Severity::information);
     const std::string problem = Host::Http::logProblem();
     if (problem.empty())
         return;
@@ -118,7 +118,7 @@ bool serve(Host::Http::Server& server, const Protection& protection, const Signa
     }
     notifyServiceManager("STOPPING=1");
     server.beginShutdown();
-    report({"serve", "ServeCommand", __LINE__}, "ending", Severity::information);
+    report({"serve", "main", __LINE__}, "ending", Severity::information);
     constexpr std::chrono::milliseconds interval{20};
     const auto end = std::chrono::steady_clock::now() + gracePeriod;
     while (!server.waitUntilIdle(interval)) {
@@ -131,7 +131,7 @@ bool serve(Host::Http::Server& server, const Protection& protection, const Signa
     return true;
 }
 
-class Server : public ServeCommand {
+class Serving : public ServeCommand {
 public:
     using ServeCommand::ServeCommand;
 
@@ -199,7 +199,7 @@ int main(int argc, char** argv)
 {
     return runTool(argc, argv, [](CLI::App& tool) {
         Commands commands;
-        commands.push_back(std::make_unique<Server>(tool));
+        commands.push_back(std::make_unique<Serving>(tool));
         return commands;
     });
 }
