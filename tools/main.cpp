@@ -13,7 +13,8 @@ namespace {
 
 // Has the allocator keep freed memory of any size, and take most of what a list of a thousand
 // sensors needs from huge pages where the system grants them: page faults take a tenth of the time
-// of a list otherwise.
+// of a list otherwise. It is called before the command is known, and takes some thirty microseconds
+// of those that need little memory.
 void prepareMemory()
 {
     constexpr std::size_t hugePage = std::size_t{2} << 20;
