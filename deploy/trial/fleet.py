@@ -50,6 +50,7 @@ class Options:
     interval: int = 5
     rule_interval: int = 5
     has_incidents: bool = True
+    keeps_history: bool = True
 
 
 class Failure(Exception):
@@ -133,6 +134,8 @@ class Fleet:
         command += ["--address", machine.address, "--port", "0", "--tls-port", self.ports.machine]
         for name in ("certificate", "key", "passwords"):
             command += [f"--{name}", self.folder / f"{name}.pem"]
+        if not self.options.keeps_history:
+            command += ["--history", "off"]
         self.services.start(name_of(machine), command)
 
     @property

@@ -1,6 +1,6 @@
 # Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-"""Incidents that befall the trial's fleet, in minutes, and the alerts that they should raise."""
+"""Incidents in the trial's fleet, in minutes, and the alerts that they should raise."""
 
 from dataclasses import dataclass
 

@@ -43,7 +43,7 @@ class Receiver:
         self.messages = []
 
         class Handler(BaseHTTPRequestHandler):
-            def do_POST(handler):  # noqa: N802, N805
+            def do_POST(handler):
                 body = json.loads(handler.rfile.read(int(handler.headers["Content-Length"])))
                 message = Message(
                     body["receiver"], body["status"], body["groupLabels"], body["alerts"]
@@ -54,7 +54,7 @@ class Receiver:
                 handler.send_header("Content-Length", "0")
                 handler.end_headers()
 
-            def log_message(handler, *_):  # noqa: N805
+            def log_message(handler, *_):
                 pass
 
         self._server = ThreadingHTTPServer(("127.0.0.1", port), Handler)

@@ -41,7 +41,7 @@ class Services:
                 stderr=log,
                 start_new_session=True,
             )
-        self._tell_guard(self._processes[name])
+        self._send_to_guard(self._processes[name])
 
     def pid(self, name):
         return self._processes[name].pid
@@ -68,18 +68,18 @@ class Services:
             except subprocess.TimeoutExpired:
                 process.kill()
                 process.wait()
-            self._tell_guard(process)
+            self._send_to_guard(process)
 
     def kill(self, name):
         process = self._processes.pop(name)
         process.kill()
         process.wait()
-        self._tell_guard(process)
+        self._send_to_guard(process)
 
     def close(self):
         """Ends all processes."""
         self.stop(*self._processes)
         self._guard.communicate()
 
-    def _tell_guard(self, process):
+    def _send_to_guard(self, process):
         print(process.pid, file=self._guard.stdin, flush=True)
