@@ -3,40 +3,50 @@
 #include "tools/metrics/SensorMetrics.h"
 
 #include <algorithm>
-#include <string_view>
-#include <tuple>
+#include <array>
+#include <optional>
+#include <unordered_map>
 #include <utility>
 
 namespace Tools {
 
 namespace {
 
-// A quantity that has families of its own, in one unit.
-struct Measure {
-    std::string_view kind; // of sensors
-    std::string_view symbol;
-    MetricFamily reading;
-    MetricFamily limit;
+enum class Part { reading, limits, states, health };
+
+// A family of series, of the sensors in one unit or of all.
+struct SensorFamily {
+    MetricFamily family;
+    Part part;
+    std::string_view kind = {}; // of sensors; empty for all
+    std::string_view symbol = {};
 };
 
 constexpr auto gauge = MetricFamily::Type::gauge;
-constexpr std::array measures = {
-    Measure{"temperature", "°C",
+constexpr std::array families = {
+    SensorFamily{
         {"sensor_profile_reading_celsius", "Temperature that the sensor reads.", gauge, "celsius"},
-        {"sensor_profile_limit_celsius", "Limit of a temperature.", gauge, "celsius"}},
-    Measure{"voltage", "V",
-        {"sensor_profile_reading_volts", "Voltage that the sensor reads.", gauge, "volts"},
-        {"sensor_profile_limit_volts", "Limit of a voltage.", gauge, "volts"}},
-    Measure{"fan", "RPM",
-        {"sensor_profile_reading_rpm", "Revolutions per minute of a fan.", gauge, "rpm"},
-        {"sensor_profile_limit_rpm", "Limit of the revolutions per minute of a fan.", gauge,
-            "rpm"}}};
-
-constexpr MetricFamily stateFamily{"sensor_profile_state",
-    "State of the sensor: 1 for the present one, 0 for the others that it can have."};
-constexpr MetricFamily healthFamily{"sensor_profile_health",
-    "HealthState of the sensor (CIM_ManagedSystemElement): 0 unknown, 5 OK, 10 degraded, 15 minor "
-    "failure, 20 major failure, 25 critical failure, 30 non-recoverable error."};
+        Part::reading, "temperature", "°C"},
+    SensorFamily{{"sensor_profile_limit_celsius", "Limit of a temperature.", gauge, "celsius"},
+        Part::limits, "temperature", "°C"},
+    SensorFamily{{"sensor_profile_reading_volts", "Voltage that the sensor reads.", gauge, "volts"},
+        Part::reading, "voltage", "V"},
+    SensorFamily{{"sensor_profile_limit_volts", "Limit of a voltage.", gauge, "volts"},
+        Part::limits, "voltage", "V"},
+    SensorFamily{{"sensor_profile_reading_rpm", "Revolutions per minute of a fan.", gauge, "rpm"},
+        Part::reading, "fan", "RPM"},
+    SensorFamily{
+        {"sensor_profile_limit_rpm", "Limit of the revolutions per minute of a fan.", gauge, "rpm"},
+        Part::limits, "fan", "RPM"},
+    SensorFamily{{"sensor_profile_state",
+                     "State of the sensor: 1 for the present one, 0 for the others that it can "
+                     "have."},
+        Part::states},
+    SensorFamily{{"sensor_profile_health",
+                     "HealthState of the sensor (CIM_ManagedSystemElement): 0 unknown, 5 OK, 10 "
+                     "degraded, 15 minor failure, 20 major failure, 25 critical failure, 30 "
+                     "non-recoverable error."},
+        Part::health}};
 
 constexpr std::string_view lost = "Lost"; // a state that any sensor can have
 
@@ -44,26 +54,16 @@ constexpr std::string_view lost = "Lost"; // a state that any sensor can have
 constexpr std::array<std::string_view, limitKinds.size()> limitNames = {"lower_warning",
     "lower_critical", "lower_fatal", "upper_warning", "upper_critical", "upper_fatal"};
 
-Labels labelsOf(const Sensor& sensor)
-{
-    Labels labels;
-    labels.add("device_id", sensor.deviceId).add("chip", sensor.chip);
-    labels.add("device", sensor.device).add("label", sensor.label);
-    return labels;
-}
-
 // A sensor without a unit has that of its kind.
-bool isOf(const Measure& measure, const Sensor& sensor)
+bool isOf(const SensorFamily& family, const Sensor& sensor)
 {
-    return sensor.unit.empty() ? sensor.kind == measure.kind : sensor.unit == measure.symbol;
+    return family.kind.empty() ||
+           (sensor.unit.empty() ? sensor.kind == family.kind : sensor.unit == family.symbol);
 }
 
-// Returns null for a sensor in another unit.
-const Measure* measureOf(const Sensor& sensor)
+bool hasReadingIn(const SensorFamily& family, const Sensor& sensor)
 {
-    const auto* const found = std::find_if(measures.begin(), measures.end(),
-        [&](const Measure& measure) { return isOf(measure, sensor); });
-    return found == measures.end() ? nullptr : found;
+    return sensor.reading && isOf(family, sensor);
 }
 
 // Returns a word such as "Warning high" as the value of a label, "warning_high".
@@ -76,80 +76,129 @@ std::string valueOf(std::string_view word)
     return value;
 }
 
-// Returns the line of the reading up to its number.
-std::string readingOf(const Sensor& sensor, const Measure& measure)
+// Returns the series of the sensor; of a reading, with the number 0.
+std::vector<Series> seriesOf(const Sensor& sensor, Part part)
 {
-    std::string line = linesOf(measure.reading, {{labelsOf(sensor), 0}});
-    line.erase(line.rfind(' '));
-    return line;
-}
-
-std::string limitsOf(const Sensor& sensor, const Measure& measure)
-{
-    const Labels labels = labelsOf(sensor);
+    Labels labels;
+    labels.add("device_id", sensor.deviceId).add("chip", sensor.chip);
+    labels.add("device", sensor.device).add("label", sensor.label);
+    if (part == Part::reading)
+        return {{labels, 0}};
+    if (part == Part::health)
+        return {{labels, static_cast<double>(sensor.health)}};
     std::vector<Series> series;
-    for (std::size_t i = 0; i < limitNames.size(); ++i)
-        if (const auto& limit = sensor.limits.at(i))
-            series.push_back({Labels(labels).add("limit", limitNames.at(i)), limit->number()});
-    return linesOf(measure.limit, series);
-}
-
-std::string statesOf(const Sensor& sensor)
-{
+    const auto add = [&](std::string_view name, std::string_view value, double number) {
+        series.push_back({labels, number});
+        series.back().labels.add(name, value);
+    };
+    if (part == Part::limits) {
+        for (std::size_t i = 0; i < limitNames.size(); ++i)
+            if (const auto& limit = sensor.limits.at(i))
+                add("limit", limitNames.at(i), limit->number());
+        return series;
+    }
     std::vector<std::string_view> words = sensor.possibleStates;
     words.insert(words.end(), {lost, sensor.state.word});
-    const Labels labels = labelsOf(sensor);
-    std::vector<Series> series;
     for (auto word = words.begin(); word != words.end(); ++word)
         if (std::find(words.begin(), word, *word) == word)
-            series.push_back({Labels(labels).add("state", valueOf(*word)),
-                *word == sensor.state.word ? 1.0 : 0.0});
-    return linesOf(stateFamily, series);
+            add("state", valueOf(*word), *word == sensor.state.word ? 1 : 0);
+    return series;
 }
 
-std::string healthOf(const Sensor& sensor)
+// Returns the lines of the sensor; of a reading, the line up to the number.
+std::string linesOf(const SensorFamily& family, const Sensor& sensor)
 {
-    return linesOf(healthFamily, {{labelsOf(sensor), static_cast<double>(sensor.health)}});
+    if (!isOf(family, sensor))
+        return "";
+    std::string lines = linesOf(family.family, seriesOf(sensor, family.part));
+    if (family.part == Part::reading)
+        lines.erase(lines.rfind(' '));
+    return lines;
 }
 
-// Returns the lines of the measure's readings, in the order of the sensors, without labels.
-std::string numbersOf(const Sensors& sensors, const Measure& measure)
+// Returns the readings of the family as lines without labels, in the order of the sensors.
+std::string numbersIn(const SensorFamily& family, const Sensors& sensors)
 {
     std::vector<Series> numbers;
     for (const Sensor& sensor : sensors)
-        if (sensor.reading && isOf(measure, sensor))
+        if (hasReadingIn(family, sensor))
             numbers.push_back({{}, sensor.reading->number()});
-    return linesOf(measure.reading, numbers);
+    return linesOf(family.family, numbers);
 }
 
-// Returns what the lines of a sensor are made of.
-auto fieldsOf(const Sensor& sensor)
+void writeReadings(Exposition& exposition, const Sensors& sensors, const SensorFamily& family,
+    const SensorTexts* lines)
 {
-    return std::tie(sensor.deviceId, sensor.chip, sensor.device, sensor.label, sensor.kind,
-        sensor.unit, sensor.limits, sensor.state.word, sensor.possibleStates, sensor.health);
+    const std::string numbers = numbersIn(family, sensors);
+    std::string_view rest = numbers;
+    for (std::size_t i = 0; i < sensors.size(); ++i) {
+        if (!hasReadingIn(family, sensors[i]))
+            continue;
+        exposition.append(lines == nullptr ? linesOf(family, sensors[i]) : lines->at(i));
+        rest.remove_prefix(family.family.name.size());
+        const std::size_t end = rest.find('\n') + 1;
+        exposition.append(rest.substr(0, end));
+        rest.remove_prefix(end);
+    }
+}
+
+// Writes the families. Their lines are null where none are kept.
+void write(Exposition& exposition, const Sensors& sensors, const std::vector<SensorTexts>* kept)
+{
+    for (std::size_t i = 0; i < families.size(); ++i) {
+        const SensorFamily& family = families.at(i);
+        const SensorTexts* const lines = kept == nullptr ? nullptr : &kept->at(i);
+        exposition.begin(family.family);
+        if (family.part == Part::reading)
+            writeReadings(exposition, sensors, family, lines);
+        else if (lines != nullptr)
+            exposition.append(lines->all);
+        else
+            for (const Sensor& sensor : sensors)
+                exposition.append(linesOf(family, sensor));
+    }
+}
+
+template <typename Number>
+void appendBytes(std::string& record, Number number)
+{
+    record.append(reinterpret_cast<const char*>(&number), sizeof number);
+}
+
+// Appends what the lines of a sensor are made of. Two sensors with equal records have equal lines.
+void appendRecord(std::string& record, const Sensor& sensor)
+{
+    const auto append = [&](std::string_view text) {
+        appendBytes(record, text.size());
+        record += text;
+    };
+    for (const std::string_view text : {std::string_view(sensor.deviceId),
+             std::string_view(sensor.chip), std::string_view(sensor.device),
+             std::string_view(sensor.label), sensor.kind, sensor.unit, sensor.state.word})
+        append(text);
+    appendBytes(record, sensor.possibleStates.size());
+    for (const std::string_view word : sensor.possibleStates)
+        append(word);
+    for (const std::optional<Quantity>& limit : sensor.limits) {
+        appendBytes(record, limit.has_value());
+        appendBytes(record, limit ? limit->value : 0);
+        appendBytes(record, limit ? limit->modifier : 0);
+    }
+    appendBytes(record, sensor.health);
 }
 
 } // namespace
 
-SensorMetrics::Lines::Lines(const Sensor& from) : sensor(from)
+void SensorTexts::add(std::string_view text)
 {
-    for (const Part part : {reading, limits, states, health})
-        parts.at(part) = linesOf(from, part);
+    all += text;
+    ends.push_back(all.size());
 }
 
-std::string SensorMetrics::linesOf(const Sensor& sensor, Part part)
+std::string_view SensorTexts::at(std::size_t sensor) const
 {
-    const Measure* const measure = measureOf(sensor);
-    switch (part) {
-    case reading:
-        return measure == nullptr ? "" : readingOf(sensor, *measure);
-    case limits:
-        return measure == nullptr ? "" : limitsOf(sensor, *measure);
-    case states:
-        return statesOf(sensor);
-    default:
-        return healthOf(sensor);
-    }
+    const std::size_t begin = sensor == 0 ? 0 : ends[sensor - 1];
+    return std::string_view(all).substr(begin, ends[sensor] - begin);
 }
 
 void SensorMetrics::addTo(Exposition& exposition, const Sensors& sensors)
@@ -157,53 +206,40 @@ void SensorMetrics::addTo(Exposition& exposition, const Sensors& sensors)
     std::unique_lock lock(mutex_);
     if (sensors.size() <= maximumKept_) {
         renew(sensors);
-        write(exposition, sensors, kept_);
+        write(exposition, sensors, &lines_);
         return;
     }
-    kept_ = {};
+    records_ = {};
+    lines_ = {};
     lock.unlock();
-    write(exposition, sensors, {});
+    write(exposition, sensors, nullptr);
 }
 
 void SensorMetrics::renew(const Sensors& sensors)
 {
-    kept_.erase(kept_.begin() + std::min(sensors.size(), kept_.size()), kept_.end());
-    for (std::size_t i = 0; i < sensors.size(); ++i)
-        if (i == kept_.size())
-            kept_.emplace_back(sensors[i]);
-        else if (fieldsOf(kept_[i].sensor) != fieldsOf(sensors[i]))
-            kept_[i] = Lines(sensors[i]);
-}
-
-void SensorMetrics::write(
-    Exposition& exposition, const Sensors& sensors, std::span<const Lines> kept)
-{
-    std::string made;
-    const auto append = [&](std::size_t i, Part part) {
-        exposition.append(kept.empty() ? made = linesOf(sensors[i], part) : kept[i].parts.at(part));
-    };
-    for (const Measure& measure : measures) {
-        exposition.begin(measure.reading);
-        const std::string numbers = numbersOf(sensors, measure);
-        std::string_view rest = numbers;
-        for (std::size_t i = 0; i < sensors.size(); ++i)
-            if (sensors[i].reading && isOf(measure, sensors[i])) {
-                append(i, reading);
-                rest.remove_prefix(measure.reading.name.size());
-                exposition.append(rest.substr(0, rest.find('\n') + 1));
-                rest.remove_prefix(rest.find('\n') + 1);
-            }
-        exposition.begin(measure.limit);
-        for (std::size_t i = 0; i < sensors.size(); ++i)
-            if (isOf(measure, sensors[i]))
-                append(i, limits);
+    SensorTexts records;
+    records.all.reserve(records_.all.size());
+    records.ends.reserve(sensors.size());
+    for (const Sensor& sensor : sensors) {
+        appendRecord(records.all, sensor);
+        records.ends.push_back(records.all.size());
     }
-    exposition.begin(stateFamily);
-    for (std::size_t i = 0; i < sensors.size(); ++i)
-        append(i, states);
-    exposition.begin(healthFamily);
-    for (std::size_t i = 0; i < sensors.size(); ++i)
-        append(i, health);
+    if (!lines_.empty() && records == records_)
+        return;
+    std::unordered_map<std::string_view, std::size_t> places; // in what is kept
+    for (std::size_t i = 0; i < records_.ends.size(); ++i)
+        places.emplace(records_.at(i), i);
+    std::vector<SensorTexts> renewed(families.size());
+    for (std::size_t i = 0; i < sensors.size(); ++i) {
+        const auto place = places.find(records.at(i));
+        for (std::size_t family = 0; family < families.size(); ++family)
+            renewed[family].add(place == places.end() ? linesOf(families.at(family), sensors[i])
+                                                      : lines_[family].at(place->second));
+    }
+    for (SensorTexts& texts : renewed)
+        texts.all.shrink_to_fit();
+    records_ = std::move(records);
+    lines_ = std::move(renewed);
 }
 
 } // namespace Tools

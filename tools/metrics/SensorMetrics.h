@@ -5,14 +5,24 @@
 #include "tools/metrics/Exposition.h"
 #include "tools/sensors/SensorList.h"
 
-#include <array>
 #include <cstddef>
 #include <mutex>
-#include <span>
 #include <string>
+#include <string_view>
 #include <vector>
 
 namespace Tools {
+
+// A text for each sensor, one after the other, since they are read in this order.
+struct SensorTexts {
+    std::string all;
+    std::vector<std::size_t> ends;
+
+    bool operator==(const SensorTexts&) const = default;
+
+    void add(std::string_view text);
+    std::string_view at(std::size_t sensor) const;
+};
 
 // Writes the readings, limits, states and health of sensors. From one exposition to the next, as a
 // rule only the numbers of readings change: the other lines of a sensor are kept until something
@@ -25,22 +35,12 @@ public:
     void addTo(Exposition& exposition, const Sensors& sensors);
 
 private:
-    // The lines of a sensor; of its reading, the line up to the number.
-    enum Part : std::size_t { reading, limits, states, health };
-    struct Lines {
-        explicit Lines(const Sensor& from);
-
-        Sensor sensor; // of which they are made
-        std::array<std::string, 4> parts;
-    };
-
-    static std::string linesOf(const Sensor& sensor, Part part);
-    static void write(Exposition& exposition, const Sensors& sensors, std::span<const Lines> kept);
     void renew(const Sensors& sensors);
 
     const std::size_t maximumKept_;
     std::mutex mutex_;
-    std::vector<Lines> kept_; // in the order of the latest sensors
+    SensorTexts records_;            // of what the lines are made
+    std::vector<SensorTexts> lines_; // for each family; of a reading, the line up to the number
 };
 
 } // namespace Tools
