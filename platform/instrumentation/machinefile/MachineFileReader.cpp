@@ -11,6 +11,7 @@
 
 #include <algorithm>
 #include <cstdint>
+#include <initializer_list>
 #include <limits>
 #include <optional>
 #include <sstream>
@@ -42,21 +43,20 @@ using Json = nlohmann::basic_json<Members>;
 // expects a decimal comma in some locales.
 class NumericLocale {
 public:
-    NumericLocale() : locale_(newlocale(LC_ALL_MASK, "C", nullptr)), previous_(uselocale(locale_))
-    {
-    }
+    NumericLocale() = default;
+    NumericLocale(const NumericLocale&) = delete;
+    NumericLocale& operator=(const NumericLocale&) = delete;
     ~NumericLocale()
     {
         uselocale(previous_);
         if (locale_ != nullptr)
             freelocale(locale_);
     }
-    NumericLocale(const NumericLocale&) = delete;
-    NumericLocale& operator=(const NumericLocale&) = delete;
 
 private:
-    locale_t locale_; // null when memory is exhausted: the thread keeps its locale
-    locale_t previous_;
+    // Null when memory is exhausted: the thread keeps its locale.
+    const locale_t locale_ = newlocale(LC_ALL_MASK, "C", nullptr);
+    const locale_t previous_ = uselocale(locale_);
 };
 
 // Returns a part of the file as an error message shows it: short and printable.
@@ -129,170 +129,172 @@ Json parsed(std::string_view text)
     }
 }
 
-// One step of the path from the document to a value.
-struct Place {
-    const Place* parent = nullptr;
-    std::string_view step = {};
-
-    // Returns the JSON pointer (RFC 6901), empty for the document.
-    std::string pointer() const
-    {
-        if (parent == nullptr)
-            return {};
-        std::string escaped = "/";
-        for (const char character : step) {
-            if (character == '~' || character == '/')
-                escaped += character == '~' ? "~0" : "~1";
-            else
-                escaped += character;
-        }
-        return parent->pointer() + excerpt(escaped);
-    }
+// Why a value is refused, and the place of that value below the one that is being read.
+struct Refusal {
+    std::string reason;
+    Json::json_pointer place{};
 };
 
-[[noreturn]] void fail(const Place& place, const std::string& reason)
+// Calls a function that reads a part of a value. The name or the index of the part becomes the
+// first step to the place of a refusal.
+template <typename Step, typename ReadPart>
+void readPart(const Step& step, ReadPart read)
 {
-    const bool isDocument = place.parent == nullptr;
-    throw std::runtime_error((isDocument ? "the document" : place.pointer()) + ": " + reason);
+    try {
+        read();
+    } catch (Refusal& refusal) {
+        refusal.place = Json::json_pointer() / step / refusal.place;
+        throw;
+    }
 }
 
 std::string described(const Json& value)
 {
-    if (value.is_object())
-        return "an object";
-    if (value.is_array())
-        return "an array";
+    if (value.is_structured())
+        return std::string("an ") + value.type_name();
     if (value.is_string())
         return "the string " + quote(value.get_ref<const std::string&>());
     return (value.is_number() ? "the number " : "") + value.dump();
 }
 
-[[noreturn]] void refuse(const Place& place, const std::string& expected, const Json& found)
+[[noreturn]] void refuse(const std::string& expected, const Json& found)
 {
-    fail(place, "expected " + expected + ", found " + described(found));
+    throw Refusal{"expected " + expected + ", found " + described(found)};
 }
 
 // Returns a value of one of the types in which the parser keeps values.
 template <typename T>
-const T& require(const Json& value, const Place& place, const char* expected)
+const T& require(const Json& value, const char* expected)
 {
     if (const T* const found = value.get_ptr<const T*>())
         return *found;
-    refuse(place, expected, value);
+    refuse(expected, value);
 }
 
-void read(
-    const Json& value, const Place& place, std::string& text, const char* expected = "a string")
+void read(const Json& value, std::string& text)
 {
-    text = require<std::string>(value, place, expected);
+    text = require<std::string>(value, "a string");
     if (text.find('\0') != std::string::npos)
-        fail(place, "the string holds the character NUL");
+        throw Refusal{"the string holds the character NUL"};
 }
 
-void read(const Json& value, const Place& place, NodeLexicon::NodeType& type)
+void read(const Json& value, NodeLexicon::NodeType& type)
 {
     constexpr const char* expected = R"("temperature", "voltage" or "tachometer")";
-    std::string name;
-    read(value, place, name, expected);
+    const auto& name = require<std::string>(value, expected);
     for (const Member::TypeName& known : Member::typeNames) {
         if (known.name == name) {
             type = known.type;
             return;
         }
     }
-    refuse(place, expected, value);
+    refuse(expected, value);
 }
 
-void read(const Json& value, const Place& place, unsigned& code)
+void read(const Json& value, unsigned& code)
 {
     constexpr const char* expected = "an unsigned 32-bit integer";
-    const auto number = require<std::uint64_t>(value, place, expected);
+    const auto number = require<std::uint64_t>(value, expected);
     if (number > std::numeric_limits<std::uint32_t>::max())
-        refuse(place, expected, value);
+        refuse(expected, value);
     code = static_cast<unsigned>(number);
 }
 
-void read(const Json& value, const Place& place, std::vector<unsigned>& codes)
-{
-    for (const Json& code :
-        require<Json::array_t>(value, place, "an array of unsigned 32-bit integers")) {
-        const std::string index = std::to_string(codes.size());
-        read(code, {&place, index}, codes.emplace_back());
-    }
-}
-
-void read(const Json& value, const Place& place, double& number)
+void read(const Json& value, double& number)
 {
     if (!value.is_number())
-        refuse(place, "a number", value);
+        refuse("a number", value);
     number = value.get<double>();
 }
 
 template <typename T>
-void read(const Json& value, const Place& place, std::optional<T>& optional)
+void read(const Json& value, std::optional<T>& optional)
 {
-    read(value, place, optional.emplace());
+    read(value, optional.emplace());
 }
 
-void readMember(std::string_view name, const Json& value, const Place& place, MachineFileNode& node)
+template <typename T>
+void readArray(const Json& value, std::vector<T>& elements, const char* expected)
 {
-    bool isKnown = false;
-    Member::forEach(node, [&](std::string_view known, auto& field) {
-        if (known != name)
-            return;
-        isKnown = true;
-        read(value, place, field);
-    });
-    if (!isKnown)
-        fail(place, "there is no such member");
+    for (const Json& element : require<Json::array_t>(value, expected))
+        readPart(elements.size(), [&] { read(element, elements.emplace_back()); });
 }
 
-// Throws unless the member is the first of its name.
-void requireFirst(
-    const Json::object_t& members, Json::object_t::const_iterator member, const Place& place)
+void read(const Json& value, std::vector<unsigned>& codes)
 {
-    if (members.find(member->first) != member)
-        fail(place, "the member is there twice");
+    readArray(value, codes, "an array of unsigned 32-bit integers");
 }
 
-void requireMember(const Json::object_t& members, const Place& place, std::string_view name)
+// Reads the members of an object into fields. visitFields(visit) calls visit(name, field) for each
+// member that the object may have.
+template <typename VisitFields>
+void readMembers(const Json& value, VisitFields visitFields)
 {
-    if (members.count(std::string(name)) == 0)
-        fail(place, "member \"" + std::string(name) + "\" is missing");
-}
-
-MachineFileNode nodeOf(const Json& value, const Place& place)
-{
-    MachineFileNode node;
-    const auto& members = require<Json::object_t>(value, place, "an object");
+    const auto& members = require<Json::object_t>(value, "an object");
     for (auto member = members.begin(); member != members.end(); ++member) {
-        const Place memberPlace{&place, member->first};
-        requireFirst(members, member, memberPlace);
-        readMember(member->first, member->second, memberPlace, node);
+        readPart(member->first, [&] {
+            if (members.find(member->first) != member)
+                throw Refusal{"the member is there twice"};
+            bool isKnown = false;
+            visitFields([&](std::string_view name, auto& field) {
+                if (name != member->first)
+                    return;
+                isKnown = true;
+                read(member->second, field);
+            });
+            if (!isKnown)
+                throw Refusal{"there is no such member"};
+        });
     }
-    for (const std::string_view name : {Member::type, Member::path, Member::description})
-        requireMember(members, place, name);
-    if (members.count(std::string(Member::sensorType)) == 0)
+}
+
+void requireMembers(const Json& object, std::initializer_list<std::string_view> names)
+{
+    for (const std::string_view name : names)
+        if (!object.contains(name))
+            throw Refusal{"member \"" + std::string(name) + "\" is missing"};
+}
+
+void read(const Json& value, MachineFileNode& node)
+{
+    readMembers(value, [&](auto visit) { Member::forEach(node, visit); });
+    requireMembers(value, {Member::type, Member::path, Member::description});
+    if (!value.contains(Member::sensorType))
         node.sensorType = static_cast<unsigned>(node.type);
     Member::changeThousandths(node, keepingThousandths);
-    return node;
 }
 
-std::vector<MachineFileNode> nodesOf(const Json& value, const Place& place)
+void read(const Json& value, std::vector<MachineFileNode>& nodes)
+{
+    readArray(value, nodes, "an array");
+    std::unordered_map<std::string_view, std::size_t> indices; // by path
+    for (const MachineFileNode& node : nodes) {
+        const std::size_t index = indices.size();
+        const auto [known, isNew] = indices.try_emplace(node.path, index);
+        if (!isNew)
+            throw Refusal{quote(node.path) + " is the path of /nodes/" +
+                              std::to_string(known->second) + " already",
+                Json::json_pointer() / index / "path"};
+    }
+}
+
+MachineFile fileOf(const Json& value)
 {
     std::vector<MachineFileNode> nodes;
-    std::unordered_map<std::string, std::size_t> indicesByPath;
-    for (const Json& element : require<Json::array_t>(value, place, "an array")) {
-        const std::string index = std::to_string(nodes.size());
-        const Place nodePlace{&place, index};
-        MachineFileNode node = nodeOf(element, nodePlace);
-        const auto [known, isNew] = indicesByPath.try_emplace(node.path, nodes.size());
-        if (!isNew)
-            fail({&nodePlace, Member::path}, quote(node.path) + " is the path of /nodes/" +
-                                                 std::to_string(known->second) + " already");
-        nodes.push_back(std::move(node));
-    }
-    return nodes;
+    std::optional<double> period;
+    std::optional<double> time;
+    readMembers(value, [&](auto visit) {
+        visit(Member::nodes, nodes);
+        visit(Member::period, period);
+        visit(Member::time, time);
+    });
+    requireMembers(value, {Member::nodes});
+    if (!period && !time)
+        return {std::move(nodes)};
+    requireMembers(value, {Member::period, Member::time});
+    if (*period <= 0)
+        throw Refusal{"the period is not above 0", Json::json_pointer("/period")};
+    return {std::move(nodes), Renewal{*period, *time}};
 }
 
 } // namespace
@@ -300,32 +302,12 @@ std::vector<MachineFileNode> nodesOf(const Json& value, const Place& place)
 MachineFile readMachineFile(std::string_view text)
 {
     const Json value = parsed(text);
-    const Place document;
-    const auto& members = require<Json::object_t>(value, document, "an object");
-    MachineFile file;
-    std::optional<double> period;
-    std::optional<double> time;
-    for (auto member = members.begin(); member != members.end(); ++member) {
-        const auto& [name, content] = *member;
-        const Place place{&document, name};
-        requireFirst(members, member, place);
-        if (name == Member::nodes)
-            file.nodes = nodesOf(content, place);
-        else if (name == Member::period)
-            read(content, place, period);
-        else if (name == Member::time)
-            read(content, place, time);
-        else
-            fail(place, "there is no such member");
+    try {
+        return fileOf(value);
+    } catch (const Refusal& refusal) {
+        const std::string place = excerpt(refusal.place.to_string());
+        throw std::runtime_error((place.empty() ? "the document" : place) + ": " + refusal.reason);
     }
-    requireMember(members, document, Member::nodes);
-    if (period.has_value() != time.has_value())
-        requireMember(members, document, period ? Member::time : Member::period);
-    if (period && *period <= 0)
-        fail({&document, Member::period}, "the period is not above 0");
-    if (period)
-        file.renewal = {*period, *time};
-    return file;
 }
 
 } // namespace Vorn
