@@ -2,7 +2,8 @@
 
 #include "tests/providers/RequestTrace.h"
 
-#include <regex>
+#include "tests/support/Pattern.h"
+
 #include <set>
 
 namespace Testing {
@@ -26,12 +27,12 @@ bool hasGivenLine(const LogLine& line)
 
 std::string requestLine(const LogLine& line)
 {
-    static const std::regex number(R"(( \[Line: \d+\])|(, Line: \d+))");
-    static const std::regex names(R"(.*( _RefLeftClass=.*) rc=.*)");
+    static const Pattern number(R"(( \[Line: \d+\])|(, Line: \d+))");
+    static const Pattern names(R"(.*( _RefLeftClass=.*) rc=.*)");
     std::string text = line.text.substr(0, line.text.find(",Parameters"));
     if (!hasGivenLine(line))
-        text = std::regex_replace(text, number, "");
-    if (std::smatch found; std::regex_match(line.text, found, names))
+        text = number.replace(text, "");
+    if (const auto found = names.match(line.text); !found.empty())
         text += found[1];
     const bool hasPlace = hasGivenLine(line) || line.file == "Trace";
     return line.component.substr(std::string("Nimbrel.").size()) + " " +

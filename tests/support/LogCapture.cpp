@@ -2,18 +2,19 @@
 
 #include "tests/support/LogCapture.h"
 
+#include "tests/support/Pattern.h"
+
 #include <gtest/gtest.h>
 
 #include <fstream>
-#include <regex>
 
 namespace Testing {
 
 std::string withoutPointers(const LogLine& line)
 {
-    static const std::regex pointer("=0x[0-9a-f]+");
+    static const Pattern pointer("=0x[0-9a-f]+");
     return line.function + "(" + line.file + ":" + std::to_string(line.line) + ") " +
-           std::to_string(line.level) + " " + std::regex_replace(line.text, pointer, "=PTR");
+           std::to_string(line.level) + " " + pointer.replace(line.text, "=PTR");
 }
 
 std::vector<std::string> withoutPointers(const std::vector<LogLine>& lines)
@@ -27,13 +28,12 @@ std::vector<std::string> withoutPointers(const std::vector<LogLine>& lines)
 std::vector<LogLine> LogCapture::lines(const char* channel) const
 {
     // time, channel, level, component, function(file:line), text
-    static const std::regex format(
-        R"(^(\S+) (log|trace) (\d+) (\S+) (\S+)\(([^:]*):(\d+)\) (.*)$)");
+    static const Pattern format(R"(^(\S+) (log|trace) (\d+) (\S+) (\S+)\(([^:]*):(\d+)\) (.*)$)");
     std::vector<LogLine> found;
     std::ifstream in(path(channel));
     for (std::string line; std::getline(in, line);) {
-        std::smatch m;
-        if (!std::regex_match(line, m, format)) {
+        const std::vector<std::string> m = format.match(line);
+        if (m.empty()) {
             ADD_FAILURE() << "not a log line: " << line;
             continue;
         }

@@ -4,13 +4,13 @@
 // tests/data/tools/screens.txt. A test that fails writes what it saw to screens.txt in the build
 // folder.
 
+#include "tests/support/Pattern.h"
 #include "tests/support/Texts.h"
 #include "tests/tools/Tmux.h"
 
 #include <gtest/gtest.h>
 
 #include <fstream>
-#include <regex>
 
 namespace {
 
@@ -30,11 +30,11 @@ public:
     // Waits until the terminal shows the golden screen with that title.
     void add(const std::string& title, const Tmux& terminal)
     {
-        static const std::regex time("[0-9]{2}:[0-9]{2}:[0-9]{2}");
+        static const Pattern time("[0-9]{2}:[0-9]{2}:[0-9]{2}");
         const std::string start = "== " + title + "\n";
         std::string section;
         terminal.waitForScreen([&](const std::string& screen) {
-            section = start + std::regex_replace(screen, time, "HH:MM:SS") + "\n";
+            section = start + time.replace(screen, "HH:MM:SS") + "\n";
             return golden_.find(section) != std::string::npos;
         });
         seen_ += section;

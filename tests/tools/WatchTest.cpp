@@ -2,6 +2,7 @@
 
 // `watch` in a real terminal, and without one.
 
+#include "tests/support/Pattern.h"
 #include "tests/tools/Tmux.h"
 #include "tests/tools/ToolTest.h"
 
@@ -9,7 +10,6 @@
 
 #include <algorithm>
 #include <csignal>
-#include <regex>
 
 namespace {
 
@@ -60,14 +60,13 @@ TEST_F(WatchTest, ShowsTheTableLive)
                            HasSubstr("\nboard\n  Lüfter"), HasSubstr("\ncpu\n  CPU 1"),
                            HasSubstr("\nq quit  s sort  p problems only")));
     change(node(85, 23) + fan());
-    const std::regex row("  CPU 1 +85 °C   Warning high +41 +85  ▁.*█\n");
+    const Pattern row("  CPU 1 +85 °C   Warning high +41 +85  ▁.*█\n");
     const std::string warned =
-        terminal.waitForScreen([&](const auto& seen) { return std::regex_search(seen, row); });
+        terminal.waitForScreen([&](const auto& seen) { return row.isIn(seen); });
     EXPECT_THAT(warned, HasSubstr("2 sensors: 1 normal, 1 warning.\n"));
-    EXPECT_TRUE(std::regex_search(warned, row)) << warned;
-    EXPECT_TRUE(std::regex_search(
-        warned, std::regex("\n[0-9:]{8} cpu/CPU 1: Normal -> Warning high \\(85 °C\\)\n")))
-        << warned;
+    EXPECT_TRUE(row.isIn(warned)) << warned;
+    const Pattern event("\n[0-9:]{8} cpu/CPU 1: Normal -> Warning high \\(85 °C\\)\n");
+    EXPECT_TRUE(event.isIn(warned)) << warned;
     EXPECT_THAT(terminal.screen(true), HasSubstr("\x1B[33mWarning high"));
 }
 
@@ -78,7 +77,7 @@ TEST_F(WatchTest, SensorThatVanishesIsMissingUntilItComesBack)
     terminal.waitFor("Lüfter");
     change(node(41, 1));
     const std::string gone = terminal.waitFor("board/Lüfter: Normal -> Missing");
-    EXPECT_TRUE(std::regex_search(gone, std::regex("  Lüfter +- +Missing +900  900"))) << gone;
+    EXPECT_TRUE(Pattern("  Lüfter +- +Missing +900  900").isIn(gone)) << gone;
     change(node(41, 1) + fan());
     EXPECT_THAT(terminal.waitFor("Missing -> Normal"), HasSubstr("2 sensors: 2 normal.\n"));
 }
@@ -169,11 +168,10 @@ TEST_F(WatchTest, WithoutATerminalPrintsEachChange)
     const Ended ended = run({"-c", script}, {.program = "/bin/sh"});
     const auto lines = linesOf(ended.out);
     ASSERT_GE(lines.size(), 1U);
+    const Pattern form("[0-9]{4}-[0-9]{2}-[0-9]{2}T[0-9:]{8}[-+][0-9]{4} cpu/CPU 1: (Normal -> "
+                       "Warning high \\(85 C\\)|Warning high -> Normal \\(41 C\\))");
     for (const std::string& line : lines)
-        EXPECT_TRUE(std::regex_match(line,
-            std::regex("[0-9]{4}-[0-9]{2}-[0-9]{2}T[0-9:]{8}[-+][0-9]{4} cpu/CPU 1: (Normal -> "
-                       "Warning high \\(85 C\\)|Warning high -> Normal \\(41 C\\))")))
-            << line;
+        EXPECT_TRUE(form.matches(line)) << line;
 }
 
 TEST_F(WatchTest, SourceThatFailsIsTheReasonOnTheScreen)

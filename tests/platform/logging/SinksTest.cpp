@@ -1,6 +1,7 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
 #include "tests/platform/logging/LogFile.h"
+#include "tests/support/Pattern.h"
 
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
@@ -13,7 +14,6 @@
 #include <ctime>
 #include <filesystem>
 #include <limits>
-#include <regex>
 
 namespace SinksTests {
 
@@ -24,6 +24,7 @@ using testing::HasSubstr;
 using testing::IsEmpty;
 using Testing::LogFile;
 using Testing::logLine;
+using Testing::Pattern;
 using Testing::ScopedLogSettings;
 using testing::SizeIs;
 using Testing::traceLine;
@@ -44,9 +45,9 @@ TEST(FileSinkTest, WritesTheDocumentedLine)
     const ScopedLogSettings settings({6000, file.sink(), "off"});
     logLine("some text");
     ASSERT_THAT(file.lines(), SizeIs(1));
-    const std::regex format(R"(\d{4}-\d\d-\d\dT\d\d:\d\d:\d\d\.\d{6}Z )"
-                            R"(log 6000 Nimbrel\.Sensor setVector\(Sensor:740\) some text)");
-    EXPECT_TRUE(std::regex_match(file.lines()[0], format)) << file.lines()[0];
+    const Pattern format(R"(\d{4}-\d\d-\d\dT\d\d:\d\d:\d\d\.\d{6}Z )"
+                         R"(log 6000 Nimbrel\.Sensor setVector\(Sensor:740\) some text)");
+    EXPECT_TRUE(format.matches(file.lines()[0])) << file.lines()[0];
 }
 
 TEST(FileSinkTest, TimeIsUtcWhateverTheZone)
@@ -193,9 +194,9 @@ TEST(StandardErrorSinkTest, WritesTheDocumentedLine)
         traceLine("two");
     }
     const std::string written = testing::internal::GetCapturedStderr();
-    const std::regex format(R"(\S+Z log 6000 Nimbrel\.Sensor setVector\(Sensor:740\) one\n)"
-                            R"(\S+Z trace 6000 Nimbrel\.Sensor setVector\(Sensor:740\) two\n)");
-    EXPECT_TRUE(std::regex_match(written, format)) << written;
+    const Pattern format(R"(\S+Z log 6000 Nimbrel\.Sensor setVector\(Sensor:740\) one\n)"
+                         R"(\S+Z trace 6000 Nimbrel\.Sensor setVector\(Sensor:740\) two\n)");
+    EXPECT_TRUE(format.matches(written)) << written;
 }
 
 TEST(StandardErrorSinkTest, ABrokenPipeDoesNotEndTheProcess)

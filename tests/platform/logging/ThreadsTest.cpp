@@ -1,10 +1,10 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
 #include "tests/platform/logging/LogFile.h"
+#include "tests/support/Pattern.h"
 
 #include <gtest/gtest.h>
 
-#include <regex>
 #include <set>
 #include <thread>
 
@@ -12,6 +12,7 @@ namespace ThreadsTests {
 
 using Testing::LogFile;
 using Testing::logLine;
+using Testing::Pattern;
 using Testing::ScopedLogSettings;
 using Testing::traceLine;
 
@@ -35,12 +36,11 @@ TEST(ThreadsTest, WriteWholeLinesAndLoseNone)
                     (number % 2 != 0 ? logLine : traceLine)(textOf(writer, number), 6000);
             });
     }
-    const std::regex format(
-        R"(\S{27} (log|trace) 6000 \S+ setVector\(Sensor:740\) (\d+-\d+\.{200}))");
+    const Pattern format(R"(\S{27} (log|trace) 6000 \S+ setVector\(Sensor:740\) (\d+-\d+\.{200}))");
     std::set<std::string> found;
     for (const std::string& line : file.lines()) {
-        std::smatch match;
-        ASSERT_TRUE(std::regex_match(line, match, format)) << line;
+        const std::vector<std::string> match = format.match(line);
+        ASSERT_FALSE(match.empty()) << line;
         found.insert(match[2]);
     }
     EXPECT_EQ(found.size(), static_cast<std::size_t>(writers * linesPerWriter));
