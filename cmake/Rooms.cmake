@@ -1,22 +1,18 @@
 # Each room of the source tree is one static library; includes are written from the root, so
 # that every include line names the room it reaches into.
 
-# The presets compile several files of a target as one, in a fraction of the time. FILES_APART is
-# for targets whose files define the same names in unnamed namespaces.
+# The presets compile several files of a target as one, in a fraction of the time.
 
-# sensor_profile_room(NAME [FILES_APART] [FUZZED] [PARSES_OPTIONS] SOURCES ...
+# sensor_profile_room(NAME [FUZZED] [PARSES_OPTIONS] SOURCES ...
 #                     [USES public libraries ...] [PRIVATELY private libraries ...])
 # A FUZZED room is compiled with the counters that guide its fuzz target. A room that PARSES_OPTIONS
 # of the command line is hardly optimised: the templates for that take longest of all and run once.
 function(sensor_profile_room name)
   cmake_parse_arguments(
-    room "FILES_APART;FUZZED;PARSES_OPTIONS" "" "SOURCES;USES;PRIVATELY" ${ARGN})
+    room "FUZZED;PARSES_OPTIONS" "" "SOURCES;USES;PRIVATELY" ${ARGN})
   add_library(${name} STATIC ${room_SOURCES})
   target_include_directories(${name} PUBLIC "${PROJECT_SOURCE_DIR}")
   target_link_libraries(${name} PUBLIC ${room_USES} PRIVATE ${room_PRIVATELY})
-  if(room_FILES_APART)
-    set_target_properties(${name} PROPERTIES UNITY_BUILD OFF)
-  endif()
   if(room_FUZZED AND SENSOR_PROFILE_FUZZ)
     target_compile_options(${name} PRIVATE -fsanitize=fuzzer-no-link)
   endif()
@@ -25,21 +21,21 @@ function(sensor_profile_room name)
   endif()
 endfunction()
 
-# sensor_profile_test(NAME [FILES_APART] [SINGLE_THREADED] SOURCES ... USES libraries ...
-#                     [ENVIRONMENT variables ...] [SHARDS number])
+# sensor_profile_test(NAME [SINGLE_THREADED] SOURCES ... [THREADED sources ...]
+#                     USES libraries ... [ENVIRONMENT variables ...] [SHARDS number])
 # Adds one GoogleTest executable and registers it with CTest. The test framework's headers, which take
 # most of the time of each test file, are compiled once and shared. The thread sanitizer has nothing
-# to find in SINGLE_THREADED tests, so that it does without them. With SHARDS, CTest runs so many
-# parts of the tests side by side.
+# to find in SINGLE_THREADED tests, so that it does without them; where some SOURCES are THREADED, it
+# takes only these. With SHARDS, CTest runs so many parts of the tests side by side.
 function(sensor_profile_test name)
   cmake_parse_arguments(
-    test "FILES_APART;SINGLE_THREADED" "SHARDS" "SOURCES;USES;ENVIRONMENT" ${ARGN})
+    test "SINGLE_THREADED" "SHARDS" "SOURCES;THREADED;USES;ENVIRONMENT" ${ARGN})
+  if(test_THREADED AND SENSOR_PROFILE_SANITIZE MATCHES "thread")
+    set(test_SOURCES ${test_THREADED})
+  endif()
   sensor_profile_test_executable(${name} ${test_SOURCES})
   target_precompile_headers(${name} REUSE_FROM test_headers)
   target_link_libraries(${name} PRIVATE ${test_USES} support_log)
-  if(test_FILES_APART)
-    set_target_properties(${name} PROPERTIES UNITY_BUILD OFF)
-  endif()
   if(test_SINGLE_THREADED AND SENSOR_PROFILE_SANITIZE MATCHES "thread")
     set_target_properties(${name} PROPERTIES EXCLUDE_FROM_ALL TRUE)
     return()
@@ -65,13 +61,11 @@ function(sensor_profile_test name)
   endforeach()
 endfunction()
 
-# Adds an executable with the options of all tests, which their precompiled headers need, too.
+# Adds an executable with the definitions of all tests, which their precompiled headers need, too.
 function(sensor_profile_test_executable name)
   add_executable(${name} ${ARGN})
   target_include_directories(${name} PRIVATE "${PROJECT_SOURCE_DIR}")
   target_link_libraries(${name} PRIVATE GTest::gmock GTest::gtest_main)
-  # Optimising the tests would only take time, and _FORTIFY_SOURCE needs optimisation.
-  target_compile_options(${name} PRIVATE -O0 -U_FORTIFY_SOURCE)
   target_compile_definitions(${name} PRIVATE
     SENSOR_PROFILE_SOURCE_DIR="${PROJECT_SOURCE_DIR}"
     SENSOR_PROFILE_BINARY_DIR="${PROJECT_BINARY_DIR}")
