@@ -21,6 +21,7 @@
 namespace {
 
 using namespace Testing;
+using testing::AllOf;
 using testing::HasSubstr;
 
 using Labeled = std::pair<std::string, std::map<std::string, std::string>>;
@@ -285,18 +286,25 @@ TEST_F(HwmonMetricsTest, DevicesAreThoseOfThePresentChips)
 TEST_F(HwmonMetricsTest, SourceIsUpUnlessItsChipsCannotBeListed)
 {
     const std::string up = "\nsensor_profile_source_up{source=\"hwmon\"} ";
+    const TemporaryFolder folder;
+    const std::string model = "model:" + folder.write("model.json", R"({"nodes": [
+        {"type": "temperature", "path": "/m/a", "description": "A", "status": 1, "reading": 40}]})");
+    const std::string reading = "\nsensor_profile_reading_celsius{device_id=\"A:/m/a\"";
+    const std::string modelIsUp = "\nsensor_profile_source_up{source=\"" + model + "\"} 1\n";
     bind("");
     add("hwmon0/name", "first");
     add("hwmon0/temp1_input", "41000");
     add("hwmon0/fan1_input", "900");
-    const ServerProcess server({});
-    EXPECT_THAT(scrape(server), HasSubstr(up + "1\n"));
+    const ServerProcess server({}, {{"VORN_INSTRUMENTATION", "hwmon," + model}});
+    std::string text = scrape(server);
+    EXPECT_THAT(text, AllOf(HasSubstr(up + "1\n"), HasSubstr(modelIsUp), HasSubstr(reading)));
+    EXPECT_EQ(countOf(text, "\nsensor_profile_health{"), 3U);
 
     sysfs_->rename("hwmon", "gone");
     std::filesystem::create_symlink("hwmon", sysfs_->path("hwmon"));
-    std::string text = scrape(server);
-    EXPECT_THAT(text, HasSubstr(up + "0\n"));
-    EXPECT_EQ(countOf(text, "\nsensor_profile_health{"), 0U);
+    text = scrape(server);
+    EXPECT_THAT(text, AllOf(HasSubstr(up + "0\n"), HasSubstr(modelIsUp), HasSubstr(reading)));
+    EXPECT_EQ(countOf(text, "\nsensor_profile_health{"), 1U);
     sysfs_->remove("hwmon");
     sysfs_->rename("gone", "hwmon");
 
@@ -305,7 +313,7 @@ TEST_F(HwmonMetricsTest, SourceIsUpUnlessItsChipsCannotBeListed)
     std::this_thread::sleep_for(std::chrono::milliseconds(2100));
     text = scrape(server);
     EXPECT_THAT(text, HasSubstr(up + "1\n"));
-    EXPECT_EQ(countOf(text, "\nsensor_profile_health{"), 1U);
+    EXPECT_EQ(countOf(text, "\nsensor_profile_health{"), 2U);
 }
 
 } // namespace

@@ -67,7 +67,8 @@ Chips listChips(Vorn::Hwmon::ChipList::Clock::duration ageOfAttributes)
 using Identifiers = std::unordered_set<std::string_view>;
 
 // Returns whether the source can be listed and the harvest has all its sensors.
-bool isUp(const Vorn::SourceEntry& entry, const Chips& chips, const Identifiers& harvested)
+bool isUp(const Vorn::SourceEntry& entry, const Vorn::Hwmon::Catalogue* chips,
+    const Identifiers& harvested)
 {
     const auto isHarvested = [&](const Vorn::Node& node) {
         return harvested.contains(deviceIdOf(node.description, node.path));
@@ -88,8 +89,14 @@ bool isUp(const Vorn::SourceEntry& entry, const Chips& chips, const Identifiers&
     }
 }
 
-std::map<std::string, bool> statesOfSources(const Chips& chips, const Identifiers& harvested)
+} // namespace
+
+std::map<std::string, bool> statesOfSources(
+    const Sensors& sensors, const Vorn::Hwmon::Catalogue* chips)
 {
+    Identifiers harvested;
+    for (const Sensor& sensor : sensors)
+        harvested.insert(sensor.deviceId);
     std::map<std::string, bool> isUpByName;
     for (const Vorn::SourceEntry& entry : configuredSources()) {
         const std::string& name = entry.scheme == "hwmon" ? entry.scheme : entry.text;
@@ -98,8 +105,6 @@ std::map<std::string, bool> statesOfSources(const Chips& chips, const Identifier
     }
     return isUpByName;
 }
-
-} // namespace
 
 std::vector<std::string> Harvest::lostSources() const
 {
@@ -119,13 +124,11 @@ Harvest readHarvest(const Host::Manager& manager, ChipDevices& devices)
         devices.nameIn(harvest.sensors, chips->machine);
     // The sources are listed once more, since the provider returns no error where one cannot be
     // read or breaks off.
-    Identifiers harvested;
-    for (const Sensor& sensor : harvest.sensors)
-        harvested.insert(sensor.deviceId);
-    harvest.sources = statesOfSources(chips, harvested);
+    harvest.sources = statesOfSources(harvest.sensors, chips.get());
     // An attribute that is gone may still be in this list of the chips.
     if (chips && !harvest.lostSources().empty())
-        harvest.sources = statesOfSources(listChips(std::chrono::seconds(0)), harvested);
+        harvest.sources =
+            statesOfSources(harvest.sensors, listChips(std::chrono::seconds(0)).get());
     harvest.duration = std::chrono::steady_clock::now() - begin;
     return harvest;
 }

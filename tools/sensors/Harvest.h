@@ -14,6 +14,10 @@ namespace Host {
 class Manager;
 }
 
+namespace Vorn::Hwmon {
+struct Catalogue;
+}
+
 namespace Tools {
 
 // The sensors of the machine at one time, without their instances, in the provider's order.
@@ -31,5 +35,10 @@ struct Harvest {
 // Reads all sensors through the provider. Where a source fails, the harvest has those of the
 // others.
 Harvest readHarvest(const Host::Manager& manager, ChipDevices& devices);
+
+// Returns the state of each source, as a harvest with these sensors has it. The chips are those of
+// the source hwmon; null where they cannot be listed.
+std::map<std::string, bool> statesOfSources(
+    const Sensors& sensors, const Vorn::Hwmon::Catalogue* chips);
 
 } // namespace Tools
