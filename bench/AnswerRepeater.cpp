@@ -5,7 +5,6 @@
 #include <netinet/in.h>
 #include <netinet/tcp.h>
 #include <sys/socket.h>
-#include <unistd.h>
 
 #include <array>
 #include <cerrno>
@@ -54,32 +53,30 @@ AnswerRepeater::AnswerRepeater(std::size_t requestSize, const std::string& body)
           "HTTP/1.1 200 OK\r\nContent-Length: " + std::to_string(body.size()) + "\r\n\r\n" + body),
       socket_(::socket(AF_INET, SOCK_STREAM | SOCK_CLOEXEC, 0))
 {
-    require(socket_ >= 0);
+    require(socket_.isOpen());
     ::sockaddr_in address{};
     address.sin_family = AF_INET;
     address.sin_addr.s_addr = htonl(INADDR_LOOPBACK);
     ::socklen_t size = sizeof address;
     auto* const raw = reinterpret_cast<::sockaddr*>(&address);
-    require(::bind(socket_, raw, size) == 0 && ::listen(socket_, 1) == 0 &&
-            ::getsockname(socket_, raw, &size) == 0);
+    require(::bind(socket_.number(), raw, size) == 0 && ::listen(socket_.number(), 1) == 0 &&
+            ::getsockname(socket_.number(), raw, &size) == 0);
     port_ = ntohs(address.sin_port);
     thread_ = std::jthread([this] { serve(); });
 }
 
 AnswerRepeater::~AnswerRepeater()
 {
-    ::shutdown(socket_, SHUT_RDWR); // where no client has connected
+    ::shutdown(socket_.number(), SHUT_RDWR); // where no client has connected
     thread_.join();
-    ::close(socket_);
 }
 
 void AnswerRepeater::serve() const
 {
-    const int client = ::accept(socket_, nullptr, nullptr);
+    const Vorn::Descriptor client(::accept(socket_.number(), nullptr, nullptr));
     const int on = 1;
-    ::setsockopt(client, IPPROTO_TCP, TCP_NODELAY, &on, sizeof on);
-    while (receive(client, requestSize_) && send(client, answer_)) {}
-    ::close(client);
+    ::setsockopt(client.number(), IPPROTO_TCP, TCP_NODELAY, &on, sizeof on);
+    while (receive(client.number(), requestSize_) && send(client.number(), answer_)) {}
 }
 
 } // namespace Bench

@@ -2,6 +2,8 @@
 
 #pragma once
 
+#include "platform/instrumentation/Descriptor.h"
+
 #include <cstddef>
 #include <cstdint>
 #include <string>
@@ -28,7 +30,7 @@ private:
 
     const std::size_t requestSize_;
     const std::string answer_;
-    const int socket_;
+    const Vorn::Descriptor socket_;
     std::uint16_t port_ = 0;
     std::jthread thread_;
 };

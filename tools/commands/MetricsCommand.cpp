@@ -4,12 +4,12 @@
 #include "tools/SourceOptions.h"
 #include "tools/cim/ProviderClient.h"
 #include "tools/commands/Commands.h"
+#include "tools/metrics/CompatibleOption.h"
 #include "tools/metrics/HarvestMetrics.h"
 #include "tools/metrics/HwmonMetrics.h"
 #include "tools/output/FileReplacement.h"
 #include "tools/output/Output.h"
 #include "tools/sensors/Sources.h"
-#include "tools/serve/CompatibleOption.h"
 
 #include <CLI/CLI.hpp>
 

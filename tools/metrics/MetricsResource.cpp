@@ -50,6 +50,7 @@ std::shared_ptr<const UnsentText> MetricsResource::write(ExpositionForm form)
 {
     if (!unsent_.hasRoomFor(latestSize_)) // before the sensors are read in vain
         throw tooMuchUnsentText();
+    // From one text to the next, some numbers become longer.
     Exposition exposition(form, latestSize_ + latestSize_ / 64);
     auto harvest = harvests_.get();
     const std::size_t sensors = harvest->sensors.size();

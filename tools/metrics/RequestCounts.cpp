@@ -42,7 +42,8 @@ std::string_view operationOf(const Host::CimXml::Message& message)
 
 } // namespace
 
-// A counter that begins with its first request has no rate that includes it.
+// A counter that begins with its first request has no rate that includes it. All results of each
+// operation would be too many series: those other than "ok" begin when they occur.
 RequestCounts::RequestCounts(Host::CimXml::OperationHandler& handler) : handler_(handler)
 {
     for (const auto& form : Host::CimXml::offeredOperations())

@@ -158,7 +158,7 @@ Sensor::Sensor(const Host::Instance& from) : instance(&from)
     const bool isSilent = has(noContact) || enabledState == disabled || enabledState == offline;
     if (!has(lostCommunication) && !(current == 0 && isSilent))
         reading = quantityOf(current, modifier);
-    for (const std::size_t i : {0U, 3U, 1U, 4U, 2U, 5U})
+    for (const std::size_t i : {0U, 3U, 1U, 4U, 2U, 5U}) // in the provider's order
         limits.at(i) = quantityOf(properties.number(limitKinds.at(i).property), modifier);
 }
 

@@ -3,7 +3,7 @@
 #include "tools/serve/ServeOptions.h"
 
 #include "tools/UsageError.h"
-#include "tools/serve/CompatibleOption.h"
+#include "tools/metrics/CompatibleOption.h"
 #include "tools/serve/ConfigurationFile.h"
 
 #include <CLI/CLI.hpp>
