@@ -21,7 +21,7 @@ namespace {
 constexpr std::array interopNamespaces = {"root/interop", "root/PG_InterOp"};
 
 // Returns null where the object manager serves no registration.
-const CMPIObjectPath* registeredProfile(const Upcalls& upcalls)
+const CMPIObjectPath* registeredProfile(const ProviderUpcalls& upcalls)
 {
     for (const char* const nameSpace : interopNamespaces)
         if (const auto paths = upcalls.names(nameSpace, RegisteredProfileClass); !paths.empty())
@@ -29,7 +29,8 @@ const CMPIObjectPath* registeredProfile(const Upcalls& upcalls)
     return nullptr;
 }
 
-std::set<std::string> nameSpacesBeside(const Upcalls& upcalls, const CMPIObjectPath* profile)
+std::set<std::string> nameSpacesBeside(
+    const ProviderUpcalls& upcalls, const CMPIObjectPath* profile)
 {
     std::set<std::string> names;
     const char* const interop = nameSpaceOf(profile);
@@ -45,7 +46,7 @@ std::set<std::string> nameSpacesBeside(const Upcalls& upcalls, const CMPIObjectP
 
 } // namespace
 
-Conformance wholeConformance(const Upcalls& upcalls)
+Conformance wholeConformance(const ProviderUpcalls& upcalls)
 {
     Conformance whole = {registeredProfile(upcalls), {}};
     for (const std::string& nameSpace : nameSpacesBeside(upcalls, whole.profile))
@@ -54,7 +55,7 @@ Conformance wholeConformance(const Upcalls& upcalls)
     return whole;
 }
 
-Conformance conformanceOf(const Upcalls& upcalls, const CMPIObjectPath* object)
+Conformance conformanceOf(const ProviderUpcalls& upcalls, const CMPIObjectPath* object)
 {
     if (isOfClass(object, RegisteredProfileClass)) {
         Conformance whole = wholeConformance(upcalls);
@@ -73,7 +74,7 @@ Conformance conformanceOf(const Upcalls& upcalls, const CMPIObjectPath* object)
 }
 
 std::vector<CMPIInstance*> conformingSensors(
-    const Upcalls& upcalls, const CMPIObjectPath* object, const char** properties)
+    const ProviderUpcalls& upcalls, const CMPIObjectPath* object, const char** properties)
 {
     std::vector<CMPIInstance*> all;
     const CMPIObjectPath* const profile = registeredProfile(upcalls);

@@ -6,7 +6,7 @@
 
 #pragma once
 
-#include "companion/Upcalls.h"
+#include "companion/ProviderUpcalls.h"
 
 namespace Vorn::Companion {
 
@@ -19,15 +19,15 @@ struct Conformance {
 };
 
 // Returns the registration with all sensors.
-Conformance wholeConformance(const Upcalls& upcalls);
+Conformance wholeConformance(const ProviderUpcalls& upcalls);
 
 // Returns the registration with the sensors whose associations refer to the object: all for the
 // registration itself, the object alone for a sensor that exists, none for any other object.
-Conformance conformanceOf(const Upcalls& upcalls, const CMPIObjectPath* object);
+Conformance conformanceOf(const ProviderUpcalls& upcalls, const CMPIObjectPath* object);
 
 // Returns the instances of all sensors when the object is the registration, none for any other
 // object. The list of properties ends with a null and is null for all properties.
 std::vector<CMPIInstance*> conformingSensors(
-    const Upcalls& upcalls, const CMPIObjectPath* object, const char** properties);
+    const ProviderUpcalls& upcalls, const CMPIObjectPath* object, const char** properties);
 
 } // namespace Vorn::Companion

@@ -197,7 +197,7 @@ private:
     const char** properties_;
     const bool isFromProfile_ = isOfClass(target_, RegisteredProfileClass);
     const std::string systemName_ = getSystemName();
-    Upcalls upcalls_;
+    ProviderUpcalls upcalls_;
     ResultWriter result_;
 };
 

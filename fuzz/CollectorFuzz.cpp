@@ -20,7 +20,7 @@ class InputTransport : public Ipmi::Transport {
 public:
     explicit InputTransport(std::span<const std::uint8_t> input) : input_(input) {}
 
-    Ipmi::Bytes send(const Ipmi::Command& /*command*/, std::chrono::milliseconds) override
+    Ipmi::Bytes send(const Ipmi::AddressedCommand& /*command*/, std::chrono::milliseconds) override
     {
         if (input_.empty())
             throw Ipmi::SilentBmc(true);

@@ -33,7 +33,8 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
         sensor.reading = Quantity{1, 0};
         const auto next = std::chrono::seconds(secondsOfSlot * (newest + 1));
         history.add({&sensor}, std::chrono::system_clock::time_point(next));
-        const auto write = [](const std::string& deviceId, const Samples& samples, Slot last) {
+        const auto write = [](const std::string& deviceId, const Samples& samples,
+                               SlotNumber last) {
             std::string json;
             appendHour(json, deviceId, samples, last);
             appendThinnedHour(json, deviceId, samples, last);

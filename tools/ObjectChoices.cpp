@@ -4,8 +4,8 @@
 
 #include "tools/EmptyMachine.h"
 #include "tools/output/Output.h"
+#include "tools/output/PrintableText.h"
 #include "tools/output/Terminal.h"
-#include "tools/output/Utf8.h"
 
 #include <CLI/CLI.hpp>
 

@@ -14,16 +14,16 @@ namespace {
 // The columns of the table of messages; the first is the fallback.
 constexpr std::array<std::wstring_view, 5> languages = {L"en", L"de", L"fr", L"es", L"ja"};
 
-struct Message {
+struct MessageTexts {
     std::wstring_view id;
     std::array<std::wstring_view, languages.size()> texts;
 };
 
 // The insert is the sensor's name, such as "CPU 1 Temp".
 constexpr std::array messages = {
-    Message{L"MSGID_SENSOR_CAPTION",
+    MessageTexts{L"MSGID_SENSOR_CAPTION",
         {L"Sensor %s", L"Sensor %s", L"Capteur %s", L"Sensor %s", L"センサー %s"}},
-    Message{L"MSGID_SENSOR_DESCRIPTION",
+    MessageTexts{L"MSGID_SENSOR_DESCRIPTION",
         {L"Numeric sensor %s, read from this computer's hardware",
             L"Numerischer Sensor %s, ausgelesen aus der Hardware dieses Computers",
             L"Capteur numérique %s, lu sur le matériel de cet ordinateur",
@@ -37,7 +37,7 @@ constexpr bool hasOneInsert(std::wstring_view text)
     return text.substr(std::min(percent, text.size()), 2) == L"%s" &&
            text.find(L'%', percent + 1) == std::wstring_view::npos;
 }
-static_assert(std::all_of(messages.begin(), messages.end(), [](const Message& message) {
+static_assert(std::all_of(messages.begin(), messages.end(), [](const MessageTexts& message) {
     return std::all_of(message.texts.begin(), message.texts.end(), hasOneInsert);
 }));
 
@@ -55,7 +55,7 @@ std::size_t columnOf(std::wstring_view library)
 
 std::wstring_view textOf(std::wstring_view library, std::wstring_view messageId)
 {
-    for (const Message& message : messages)
+    for (const MessageTexts& message : messages)
         if (message.id == messageId)
             return message.texts[columnOf(library)];
     return L"%s";

@@ -4,7 +4,7 @@
 
 #include "platform/utilities/ProviderUtilities.h"
 #include "tests/tools/ToolTest.h"
-#include "tools/output/Utf8.h"
+#include "tools/output/PrintableText.h"
 
 #include <gmock/gmock.h>
 

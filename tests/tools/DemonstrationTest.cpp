@@ -4,7 +4,7 @@
 // that of `COLUMNS=80 LC_ALL=C.UTF-8 sensorctl list --model schema/demo-model.json`.
 
 #include "tests/tools/ToolTest.h"
-#include "tools/output/Utf8.h"
+#include "tools/output/PrintableText.h"
 
 #include <gmock/gmock.h>
 

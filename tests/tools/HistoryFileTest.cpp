@@ -76,7 +76,7 @@ TEST_F(HistoryFileTest, RestoresWhatItStored)
 TEST_F(HistoryFileTest, SamplesThatAreAddedWhileItIsWrittenAreLeftOut)
 {
     const json before = hour("a");
-    const Slot newest = history.newest();
+    const SlotNumber newest = history.newest();
     add({sensorOf("a", 1000), sensorOf("b", 1000)}, 3500);
     Samples samples = history.entryUntil("a:/chip/a", newest)->samples;
     std::string text;

@@ -53,7 +53,7 @@ protected:
     {
         std::string text;
         const bool isKnown = from.visit({label + ":/chip/" + label},
-            [&](const std::string&, const Samples& samples, Slot newest) {
+            [&](const std::string&, const Samples& samples, SlotNumber newest) {
                 append(text, label, samples, newest);
             });
         return isKnown ? json::parse(text) : json();

@@ -94,7 +94,7 @@ TEST_F(SensorHistoryTest, PresentSensorsAreThoseOfTheLastSampleInItsOrder)
     add({sensorOf("c", 1), sensorOf("a", 1)}, 10);
     std::vector<std::string> present;
     history.visitPresent(
-        [&](const std::string& id, const Samples&, Slot) { present.push_back(id); });
+        [&](const std::string& id, const Samples&, SlotNumber) { present.push_back(id); });
     EXPECT_THAT(present, testing::ElementsAre("c:/chip/c", "a:/chip/a"));
 }
 
@@ -122,7 +122,7 @@ TEST_F(SensorHistoryTest, SensorsOfOneAnswerAreOfTheSameTime)
     add({sensorOf("a", 1)}, 0);
     std::vector<std::string> seen;
     EXPECT_TRUE(history.visit({"none", "a:/chip/a"},
-        [&](const std::string& deviceId, const Samples& samples, Slot newest) {
+        [&](const std::string& deviceId, const Samples& samples, SlotNumber newest) {
             seen.push_back(deviceId + std::to_string(samples.ofSlot(newest).state));
         }));
     EXPECT_THAT(seen, testing::ElementsAre("none0", "a:/chip/a2"));
@@ -132,7 +132,7 @@ TEST_F(SensorHistoryTest, SensorsOfOneAnswerAreOfTheSameTime)
 TEST_F(SensorHistoryTest, NothingIsRecordedUntilAClockThatStartsInThePastIsSet)
 {
     add({sensorOf("a", 1)}, 0);
-    const Slot newest = history.newest();
+    const SlotNumber newest = history.newest();
     SensorHistory::Entries stored;
     stored["a:/chip/a"] =
         std::make_unique<SensorHistory::Entry>(*history.entryUntil("a:/chip/a", newest));

@@ -1,7 +1,7 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
 #include "tests/tools/ToolTest.h"
-#include "tools/output/Utf8.h"
+#include "tools/output/PrintableText.h"
 
 #include <gmock/gmock.h>
 

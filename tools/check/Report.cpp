@@ -2,8 +2,8 @@
 
 #include "tools/check/Report.h"
 
+#include "tools/output/PrintableText.h"
 #include "tools/output/SensorCells.h"
-#include "tools/output/Utf8.h"
 #include "tools/sensors/Selector.h"
 
 #include <algorithm>

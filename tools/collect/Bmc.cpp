@@ -19,7 +19,7 @@ constexpr milliseconds satelliteTimeout{2000};
 
 } // namespace
 
-Bytes Bmc::ask(const Command& command)
+Bytes Bmc::ask(const AddressedCommand& command)
 {
     constexpr int repetitions = 2;
     constexpr milliseconds pause{100};
@@ -31,7 +31,7 @@ Bytes Bmc::ask(const Command& command)
     return answer;
 }
 
-Bytes Bmc::exchange(const Command& command)
+Bytes Bmc::exchange(const AddressedCommand& command)
 {
     const auto begin = Clock::now();
     const Responder& responder = command.responder;

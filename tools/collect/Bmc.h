@@ -33,12 +33,12 @@ public:
     // Returns the answer from the completion code on, which is at least one byte. Repeats a command
     // to a busy controller twice. A satellite that does not answer is not asked again: the answers
     // have the completion code of a timeout. Throws SilentBmc, and what Transport::send() throws.
-    Bytes ask(const Command& command);
+    Bytes ask(const AddressedCommand& command);
 
 private:
     using Clock = std::chrono::steady_clock;
 
-    Bytes exchange(const Command& command);
+    Bytes exchange(const AddressedCommand& command);
     bool isAlive(Clock::time_point end);
 
     Transport& transport_;

@@ -51,7 +51,7 @@ IpmiDevice::IpmiDevice() : file_(::open(devicePath, O_RDWR | O_CLOEXEC))
     fail();
 }
 
-Bytes IpmiDevice::send(const Command& command, milliseconds timeout)
+Bytes IpmiDevice::send(const AddressedCommand& command, milliseconds timeout)
 {
     const auto end = std::chrono::steady_clock::now() + timeout;
     if (!submit(command, timeout))
@@ -68,7 +68,7 @@ Bytes IpmiDevice::send(const Command& command, milliseconds timeout)
 
 // Returns false where the kernel knows no way to the satellite, whose address is what a record
 // says.
-bool IpmiDevice::submit(const Command& command, milliseconds timeout)
+bool IpmiDevice::submit(const AddressedCommand& command, milliseconds timeout)
 {
     const Responder& responder = command.responder;
     ipmi_system_interface_addr bmc{

@@ -18,10 +18,10 @@ public:
     // it.
     IpmiDevice();
 
-    Bytes send(const Command& command, std::chrono::milliseconds timeout) override;
+    Bytes send(const AddressedCommand& command, std::chrono::milliseconds timeout) override;
 
 private:
-    bool submit(const Command& command, std::chrono::milliseconds timeout);
+    bool submit(const AddressedCommand& command, std::chrono::milliseconds timeout);
     Bytes receive();
 
     Vorn::Descriptor file_;

@@ -42,9 +42,9 @@ std::uint16_t wordAt(const Bytes& bytes, std::size_t at)
     return static_cast<std::uint16_t>(bytes[at] | bytes[at + 1] << 8U);
 }
 
-class Reader {
+class RecordReader {
 public:
-    explicit Reader(Bmc& bmc) : bmc_(bmc) { reserve(); }
+    explicit RecordReader(Bmc& bmc) : bmc_(bmc) { reserve(); }
 
     // Reads the header of a record, and all of an analog sensor's record. Returns the identifier of
     // the next record.
@@ -128,7 +128,7 @@ std::vector<SensorRecord> readRepository(Bmc& bmc)
     constexpr std::uint16_t first = 0;
     constexpr std::uint16_t last = 0xFFFF;
     std::vector<SensorRecord> sensors;
-    Reader reader(bmc);
+    RecordReader reader(bmc);
     Bytes record;
     std::set<std::uint16_t> visited; // a faulty repository may lead back to an earlier record
     for (std::uint16_t id = first; id != last && visited.insert(id).second;) {

@@ -31,7 +31,7 @@ enum class CommandCode : std::uint16_t {
     getSdr = 0x0A23,
 };
 
-struct Command {
+struct AddressedCommand {
     Responder responder;
     CommandCode code{};
     Bytes data;
@@ -60,7 +60,7 @@ public:
     // Sends a command and waits for its answer. Returns the bytes from the completion code on; none
     // when no answer arrives within the timeout, or when there is no way to that satellite. A late
     // answer is discarded. Throws std::system_error when the device fails.
-    virtual Bytes send(const Command& command, std::chrono::milliseconds timeout) = 0;
+    virtual Bytes send(const AddressedCommand& command, std::chrono::milliseconds timeout) = 0;
 };
 
 } // namespace Ipmi

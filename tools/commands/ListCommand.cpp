@@ -10,10 +10,10 @@
 #include "tools/output/JsonDocument.h"
 #include "tools/output/ObjectTable.h"
 #include "tools/output/Output.h"
+#include "tools/output/PrintableText.h"
 #include "tools/output/SensorCsv.h"
 #include "tools/output/SensorJson.h"
 #include "tools/output/SensorTable.h"
-#include "tools/output/Utf8.h"
 #include "tools/sensors/ChipDevices.h"
 #include "tools/sensors/Sources.h"
 

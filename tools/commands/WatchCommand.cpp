@@ -8,7 +8,7 @@
 #include "tools/commands/DisplayOptions.h"
 #include "tools/commands/SelectionOptions.h"
 #include "tools/output/Output.h"
-#include "tools/output/Utf8.h"
+#include "tools/output/PrintableText.h"
 #include "tools/sensors/ChipDevices.h"
 #include "tools/sensors/Sources.h"
 #include "tools/watch/Screen.h"

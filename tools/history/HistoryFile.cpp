@@ -25,17 +25,17 @@ struct Header {
     std::array<char, 8> magic = {'s', 'e', 'n', 's', 'o', 'r', 's', '1'};
     std::uint32_t sizeOfSamples = sizeof(Samples);
     std::uint32_t count = 0; // of the sensors that follow
-    Slot newest = 0;
+    SlotNumber newest = 0;
 };
 struct SensorHeader {
-    Slot lastSeen = 0;
+    SlotNumber lastSeen = 0;
     std::uint64_t sizeOfDeviceId = 0;
 };
 static_assert(std::has_unique_object_representations_v<Header> &&
               std::has_unique_object_representations_v<SensorHeader>);
 
-constexpr std::uint64_t maximumDeviceId = 4096; // longer ones are not stored
-constexpr Slot greatestSlot = Slot{1} << 29;    // in the year 2140
+constexpr std::uint64_t maximumDeviceId = 4096;          // longer ones are not stored
+constexpr SlotNumber greatestSlot = SlotNumber{1} << 29; // in the year 2140
 constexpr const char* damaged = "it is damaged or truncated";
 constexpr ::mode_t modeOfFile = 0600;
 

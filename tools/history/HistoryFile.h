@@ -17,7 +17,7 @@ void storeHistory(const SensorHistory& history,
 
 struct StoredHistory {
     SensorHistory::Entries entries;
-    Slot newest;
+    SlotNumber newest;
 };
 
 // Returns what storeHistory() wrote. `read` returns false where there are not as many bytes. Throws

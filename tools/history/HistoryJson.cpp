@@ -82,11 +82,12 @@ void appendHour(
 
 } // namespace
 
-void appendHour(std::string& json, std::string_view deviceId, const Samples& samples, Slot newest)
+void appendHour(
+    std::string& json, std::string_view deviceId, const Samples& samples, SlotNumber newest)
 {
     Readings values;
     StateRuns states;
-    for (Slot slot = newest - Samples::slotsKept + 1; slot <= newest; ++slot) {
+    for (SlotNumber slot = newest - Samples::slotsKept + 1; slot <= newest; ++slot) {
         const auto [value, state] = samples.ofSlot(slot);
         values.add(value);
         states.add(state);
@@ -95,16 +96,16 @@ void appendHour(std::string& json, std::string_view deviceId, const Samples& sam
 }
 
 void appendThinnedHour(
-    std::string& json, std::string_view deviceId, const Samples& samples, Slot newest)
+    std::string& json, std::string_view deviceId, const Samples& samples, SlotNumber newest)
 {
     Readings values;
     StateRuns states;
-    Slot slot = newest - Samples::slotsKept + 1;
-    for (Slot i = 0; i < thinnedSamples; ++i) {
+    SlotNumber slot = newest - Samples::slotsKept + 1;
+    for (SlotNumber i = 0; i < thinnedSamples; ++i) {
         float sum = 0;
         int count = 0;
         unsigned mostUrgent = 0;
-        for (const Slot end = slot + slotsOfMinute; slot < end; ++slot) {
+        for (const SlotNumber end = slot + slotsOfMinute; slot < end; ++slot) {
             const auto [value, state] = samples.ofSlot(slot);
             mostUrgent = moreUrgent(mostUrgent, state);
             if (std::isnan(value))
@@ -118,14 +119,16 @@ void appendThinnedHour(
     appendHour(json, deviceId, values, states);
 }
 
-void appendDay(std::string& json, std::string_view deviceId, const Samples& samples, Slot newest)
+void appendDay(
+    std::string& json, std::string_view deviceId, const Samples& samples, SlotNumber newest)
 {
     Readings minima;
     Readings means;
     Readings maxima;
     StateRuns states;
-    const Slot newestMinute = minuteOf(newest);
-    for (Slot minute = newestMinute - Samples::minutesKept + 1; minute <= newestMinute; ++minute) {
+    const SlotNumber newestMinute = minuteOf(newest);
+    for (SlotNumber minute = newestMinute - Samples::minutesKept + 1; minute <= newestMinute;
+         ++minute) {
         const auto sample = samples.ofMinute(minute);
         minima.add(sample.minimum);
         means.add(sample.mean);

@@ -12,12 +12,14 @@
 namespace Tools {
 
 // The number of samples to which an hour is thinned, each of a minute.
-inline constexpr Slot thinnedSamples = Samples::slotsKept / slotsOfMinute;
+inline constexpr SlotNumber thinnedSamples = Samples::slotsKept / slotsOfMinute;
 
-void appendHour(std::string& json, std::string_view deviceId, const Samples& samples, Slot newest);
+void appendHour(
+    std::string& json, std::string_view deviceId, const Samples& samples, SlotNumber newest);
 // A sample is the mean of the readings in its minute and has its most urgent state.
 void appendThinnedHour(
-    std::string& json, std::string_view deviceId, const Samples& samples, Slot newest);
-void appendDay(std::string& json, std::string_view deviceId, const Samples& samples, Slot newest);
+    std::string& json, std::string_view deviceId, const Samples& samples, SlotNumber newest);
+void appendDay(
+    std::string& json, std::string_view deviceId, const Samples& samples, SlotNumber newest);
 
 } // namespace Tools

@@ -13,7 +13,7 @@ static_assert(std::is_trivially_copyable_v<Samples> && sizeof(Samples) <= std::s
 namespace {
 
 // Returns the place in a ring of that size, also for times before 1970.
-std::size_t placeOf(Slot time, Slot size)
+std::size_t placeOf(SlotNumber time, SlotNumber size)
 {
     return static_cast<std::size_t>((time % size + size) % size);
 }
@@ -42,7 +42,7 @@ Samples::Samples()
     statesOfMinutes_.fill(0);
 }
 
-void Samples::add(Slot slot, const Sensor& sensor)
+void Samples::add(SlotNumber slot, const Sensor& sensor)
 {
     const auto state = static_cast<std::uint8_t>(numberOf(sensor.state));
     const float value = sensor.reading ? nearestFloat(sensor.reading->number()) : absent;
@@ -66,27 +66,27 @@ void Samples::add(Slot slot, const Sensor& sensor)
     maxima_.at(minute) = std::max(maxima_.at(minute), value);
 }
 
-void Samples::clearSlot(Slot slot)
+void Samples::clearSlot(SlotNumber slot)
 {
     const auto place = placeOf(slot, slotsKept);
     values_.at(place) = absent;
     states_.at(place) = 0;
 }
 
-void Samples::clearMinute(Slot minute)
+void Samples::clearMinute(SlotNumber minute)
 {
     const auto place = placeOf(minute, minutesKept);
     minima_.at(place) = means_.at(place) = maxima_.at(place) = absent;
     statesOfMinutes_.at(place) = 0;
 }
 
-Samples::OfSlot Samples::ofSlot(Slot slot) const
+Samples::OfSlot Samples::ofSlot(SlotNumber slot) const
 {
     const auto place = placeOf(slot, slotsKept);
     return {values_.at(place), states_.at(place)};
 }
 
-Samples::OfMinute Samples::ofMinute(Slot minute) const
+Samples::OfMinute Samples::ofMinute(SlotNumber minute) const
 {
     const auto place = placeOf(minute, minutesKept);
     return {minima_.at(place), means_.at(place), maxima_.at(place), statesOfMinutes_.at(place)};

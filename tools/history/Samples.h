@@ -13,10 +13,10 @@ namespace Tools {
 
 // Times in units of ten seconds and of minutes since 1970. A sample belongs to the unit of the wall
 // clock in which it was taken.
-using Slot = std::int64_t;
+using SlotNumber = std::int64_t;
 inline constexpr int secondsOfSlot = 10;
 inline constexpr int slotsOfMinute = 6;
-constexpr Slot minuteOf(Slot slot)
+constexpr SlotNumber minuteOf(SlotNumber slot)
 {
     return slot / slotsOfMinute;
 }
@@ -28,8 +28,8 @@ unsigned moreUrgent(unsigned earlier, unsigned later);
 // The readings and states of one sensor. Has a fixed size, and is written to files as it is.
 class Samples {
 public:
-    static constexpr Slot slotsKept = 360;
-    static constexpr Slot minutesKept = 1440;
+    static constexpr SlotNumber slotsKept = 360;
+    static constexpr SlotNumber minutesKept = 1440;
     static constexpr float absent = std::numeric_limits<float>::quiet_NaN();
 
     // A reading is NaN where the sensor had none; a state is its number, 0 where nothing was
@@ -48,14 +48,14 @@ public:
     Samples();
 
     // Adds a sample to the slot and to its minute, the newest ones.
-    void add(Slot slot, const Sensor& sensor);
+    void add(SlotNumber slot, const Sensor& sensor);
     // Remove the sample of that time.
-    void clearSlot(Slot slot);
-    void clearMinute(Slot minute);
+    void clearSlot(SlotNumber slot);
+    void clearMinute(SlotNumber minute);
 
     // REQUIRES: the slot or minute is among the last ones that are kept.
-    OfSlot ofSlot(Slot slot) const;
-    OfMinute ofMinute(Slot minute) const;
+    OfSlot ofSlot(SlotNumber slot) const;
+    OfMinute ofMinute(SlotNumber minute) const;
 
     // Returns whether all states are known: those that were read from a file may be others.
     bool isValid() const;

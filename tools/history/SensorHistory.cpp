@@ -10,24 +10,24 @@ namespace Tools {
 
 namespace {
 
-constexpr Slot slotsUntilForgotten = Samples::minutesKept * slotsOfMinute;
-constexpr Slot slotsOfDelay = Slot{5} * slotsOfMinute;
+constexpr SlotNumber slotsUntilForgotten = Samples::minutesKept * slotsOfMinute;
+constexpr SlotNumber slotsOfDelay = SlotNumber{5} * slotsOfMinute;
 constexpr std::chrono::hours clockTimeout{1};
 
 // Clears the slots after the first one until the last one, and their minutes.
-void clearBetween(Samples& samples, Slot first, Slot last)
+void clearBetween(Samples& samples, SlotNumber first, SlotNumber last)
 {
-    for (Slot slot = std::max(first, last - Samples::slotsKept) + 1; slot <= last; ++slot)
+    for (SlotNumber slot = std::max(first, last - Samples::slotsKept) + 1; slot <= last; ++slot)
         samples.clearSlot(slot);
-    const Slot lastMinute = minuteOf(last);
-    Slot minute = std::max(minuteOf(first), lastMinute - Samples::minutesKept) + 1;
+    const SlotNumber lastMinute = minuteOf(last);
+    SlotNumber minute = std::max(minuteOf(first), lastMinute - Samples::minutesKept) + 1;
     for (; minute <= lastMinute; ++minute)
         samples.clearMinute(minute);
 }
 
 } // namespace
 
-Slot SensorHistory::slotOf(std::chrono::system_clock::time_point time)
+SlotNumber SensorHistory::slotOf(std::chrono::system_clock::time_point time)
 {
     return std::chrono::floor<std::chrono::seconds>(time.time_since_epoch()).count() /
            secondsOfSlot;
@@ -36,7 +36,7 @@ Slot SensorHistory::slotOf(std::chrono::system_clock::time_point time)
 void SensorHistory::add(
     const std::vector<const Sensor*>& sensors, std::chrono::system_clock::time_point now)
 {
-    const Slot slot = slotOf(now);
+    const SlotNumber slot = slotOf(now);
     const std::unique_lock lock(mutex_);
     if (awaitsClock(slot))
         return;
@@ -63,7 +63,7 @@ void SensorHistory::add(
     }
 }
 
-bool SensorHistory::awaitsClock(Slot slot)
+bool SensorHistory::awaitsClock(SlotNumber slot)
 {
     const bool isBehind = slot < newest_ - slotsOfDelay;
     if (!isBehind)
@@ -73,7 +73,7 @@ bool SensorHistory::awaitsClock(Slot slot)
 
 // Forgets sensors last seen before the slot, longest ago first, as far as there would be more than
 // the maximum with the added ones.
-void SensorHistory::makeRoom(std::size_t added, std::size_t maximum, Slot slot)
+void SensorHistory::makeRoom(std::size_t added, std::size_t maximum, SlotNumber slot)
 {
     if (entries_.size() + added <= maximum)
         return;
@@ -89,7 +89,7 @@ void SensorHistory::makeRoom(std::size_t added, std::size_t maximum, Slot slot)
 
 // Clears what is between the newest slot and this one; where the clock was set back, also the
 // minute of this one, whose readings are no longer counted.
-void SensorHistory::advanceTo(Slot slot)
+void SensorHistory::advanceTo(SlotNumber slot)
 {
     for (auto& [deviceId, entry] : entries_) {
         clearBetween(entry->samples, std::min(slot, newest_), std::max(slot, newest_));
@@ -102,7 +102,7 @@ void SensorHistory::advanceTo(Slot slot)
         [slot](const auto& each) { return slot - each.second->lastSeen > slotsUntilForgotten; });
 }
 
-Slot SensorHistory::newest() const
+SlotNumber SensorHistory::newest() const
 {
     const std::shared_lock lock(mutex_);
     return newest_;
@@ -118,7 +118,7 @@ std::vector<std::string> SensorHistory::deviceIds() const
 }
 
 std::optional<SensorHistory::Entry> SensorHistory::entryUntil(
-    const std::string& deviceId, Slot slot) const
+    const std::string& deviceId, SlotNumber slot) const
 {
     const std::shared_lock lock(mutex_);
     const auto found = entries_.find(deviceId);
@@ -130,7 +130,7 @@ std::optional<SensorHistory::Entry> SensorHistory::entryUntil(
     return entry;
 }
 
-void SensorHistory::restore(Entries entries, Slot newest)
+void SensorHistory::restore(Entries entries, SlotNumber newest)
 {
     const std::unique_lock lock(mutex_);
     entries_ = std::move(entries);

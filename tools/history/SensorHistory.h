@@ -24,7 +24,7 @@ public:
     // as many as sensors that are there, and a hundred.
     static constexpr std::size_t maximumSensors = 10'000;
 
-    static Slot slotOf(std::chrono::system_clock::time_point time);
+    static SlotNumber slotOf(std::chrono::system_clock::time_point time);
 
     // Records the sensors, which are in the order of a list. Forgets those that were not among them
     // for a day. Records nothing for an hour after restore() while the clock is more than five
@@ -32,7 +32,7 @@ public:
     void add(const std::vector<const Sensor*>& sensors, std::chrono::system_clock::time_point now);
 
     // The last slot of which samples were recorded; 0 where there are none.
-    Slot newest() const;
+    SlotNumber newest() const;
 
     // Calls a function with the identifier and the samples of each sensor, which are empty where
     // nothing was recorded, and with newest(). Returns false where nothing was recorded of any. The
@@ -62,25 +62,25 @@ public:
 
     // What is stored of a sensor.
     struct Entry {
-        Slot lastSeen = 0;
+        SlotNumber lastSeen = 0;
         Samples samples;
     };
     std::vector<std::string> deviceIds() const;
     // Returns what add() had recorded of the sensor until that slot.
-    std::optional<Entry> entryUntil(const std::string& deviceId, Slot slot) const;
+    std::optional<Entry> entryUntil(const std::string& deviceId, SlotNumber slot) const;
     using Entries = std::map<std::string, std::unique_ptr<Entry>>;
     // Replaces everything by what was stored.
-    void restore(Entries entries, Slot newest);
+    void restore(Entries entries, SlotNumber newest);
 
 private:
-    bool awaitsClock(Slot slot);
-    void advanceTo(Slot slot);
-    void makeRoom(std::size_t added, std::size_t maximum, Slot slot);
+    bool awaitsClock(SlotNumber slot);
+    void advanceTo(SlotNumber slot);
+    void makeRoom(std::size_t added, std::size_t maximum, SlotNumber slot);
 
     mutable std::shared_mutex mutex_;
     Entries entries_;
     std::vector<Entries::const_iterator> present_;
-    Slot newest_ = 0;
+    SlotNumber newest_ = 0;
     std::chrono::steady_clock::time_point clockAwaited_{}; // until then
 };
 

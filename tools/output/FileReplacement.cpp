@@ -26,16 +26,16 @@ void check(int answer)
         throw std::system_error(errno, std::generic_category());
 }
 
-class Descriptor {
+class OpenFile {
 public:
-    explicit Descriptor(int number) : number_(number) { check(number); }
-    ~Descriptor()
+    explicit OpenFile(int number) : number_(number) { check(number); }
+    ~OpenFile()
     {
         if (number_ != -1)
             ::close(number_);
     }
-    Descriptor(const Descriptor&) = delete;
-    Descriptor& operator=(const Descriptor&) = delete;
+    OpenFile(const OpenFile&) = delete;
+    OpenFile& operator=(const OpenFile&) = delete;
 
     int number() const { return number_; }
 
@@ -90,7 +90,7 @@ private:
 
     std::string target_;
     std::string name_;
-    Descriptor file_;
+    OpenFile file_;
     bool isDone_ = false;
 };
 
@@ -103,7 +103,7 @@ mode_t modeOfNewFiles()
 
 void writeInPlace(const std::string& path, std::string_view content)
 {
-    Descriptor file(::open(path.c_str(), O_WRONLY | O_CLOEXEC));
+    OpenFile file(::open(path.c_str(), O_WRONLY | O_CLOEXEC));
     writeAll(file.number(), content);
     file.close();
 }

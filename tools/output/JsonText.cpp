@@ -3,7 +3,7 @@
 #include "tools/output/JsonText.h"
 
 #include "platform/text/Utf8.h"
-#include "tools/output/Utf8.h"
+#include "tools/output/PrintableText.h"
 
 #include <algorithm>
 #include <array>

@@ -10,8 +10,8 @@
 #include "host/broker/Text.h"
 #include "tools/cim/ObjectNames.h"
 #include "tools/cim/ValueMaps.h"
+#include "tools/output/PrintableText.h"
 #include "tools/output/Table.h"
-#include "tools/output/Utf8.h"
 
 #include <algorithm>
 #include <array>

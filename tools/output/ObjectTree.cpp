@@ -5,7 +5,7 @@
 #include "host/broker/ObjectPath.h"
 #include "tools/cim/ObjectNames.h"
 #include "tools/output/Emphasis.h"
-#include "tools/output/Utf8.h"
+#include "tools/output/PrintableText.h"
 
 #include <algorithm>
 #include <string>

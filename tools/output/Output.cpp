@@ -3,8 +3,8 @@
 #include "tools/output/Output.h"
 
 #include "platform/logging/LogSettings.h"
+#include "tools/output/PrintableText.h"
 #include "tools/output/Terminal.h"
-#include "tools/output/Utf8.h"
 
 #include <fcntl.h>
 #include <unistd.h>

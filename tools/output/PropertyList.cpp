@@ -10,8 +10,8 @@
 #include "tools/cim/ObjectNames.h"
 #include "tools/cim/ValueMaps.h"
 #include "tools/output/Emphasis.h"
+#include "tools/output/PrintableText.h"
 #include "tools/output/SensorCells.h"
-#include "tools/output/Utf8.h"
 
 #include <algorithm>
 #include <string_view>
@@ -23,13 +23,14 @@ namespace {
 
 constexpr std::size_t margin = 2;
 
-struct Object {
+struct ListedObject {
     Sensor sensor;
     const Host::ClassDeclaration* declared;
 };
 
 // Returns the meaning of a number; an empty text when it has none.
-std::string meaningIn(const Object& object, std::string_view property, const Host::Value& value)
+std::string meaningIn(
+    const ListedObject& object, std::string_view property, const Host::Value& value)
 {
     const Sensor& sensor = object.sensor;
     if (property == "CurrentReading")
@@ -41,7 +42,7 @@ std::string meaningIn(const Object& object, std::string_view property, const Hos
     return code ? std::string(meaningOf(object.declared, property, *code)) : std::string{};
 }
 
-std::string shown(const Object& object, std::string_view property, const Host::Value& value)
+std::string shown(const ListedObject& object, std::string_view property, const Host::Value& value)
 {
     if (const auto text = value.text())
         return std::string(*text);
@@ -54,7 +55,7 @@ std::string shown(const Object& object, std::string_view property, const Host::V
 
 // Returns one item, or an item for each element of an array.
 std::vector<std::string> itemsOf(
-    const Object& object, std::string_view property, const Host::Value& value, bool isUtf8)
+    const ListedObject& object, std::string_view property, const Host::Value& value, bool isUtf8)
 {
     const Host::Array* const array = value.array();
     if (array == nullptr)
@@ -97,7 +98,7 @@ std::string propertyList(
         column = std::max(column, property.name->text()->size());
     column += 2 * margin;
 
-    const Object object = {Sensor(instance), declared};
+    const ListedObject object = {Sensor(instance), declared};
     std::string text =
         emphasized(printable(nameOf(instance), style.isUtf8), Emphasis::heading, style.isColored) +
         "\n";

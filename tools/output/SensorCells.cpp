@@ -3,7 +3,7 @@
 #include "tools/output/SensorCells.h"
 
 #include "tools/cim/Units.h"
-#include "tools/output/Utf8.h"
+#include "tools/output/PrintableText.h"
 
 namespace Tools {
 

@@ -2,7 +2,7 @@
 
 #include "tools/output/SensorCsv.h"
 
-#include "tools/output/Utf8.h"
+#include "tools/output/PrintableText.h"
 
 namespace Tools {
 

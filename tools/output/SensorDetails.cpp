@@ -2,8 +2,8 @@
 
 #include "tools/output/SensorDetails.h"
 
+#include "tools/output/PrintableText.h"
 #include "tools/output/SensorCells.h"
-#include "tools/output/Utf8.h"
 
 namespace Tools {
 

@@ -2,9 +2,9 @@
 
 #include "tools/output/SensorTable.h"
 
+#include "tools/output/PrintableText.h"
 #include "tools/output/SensorCells.h"
 #include "tools/output/Terminal.h"
-#include "tools/output/Utf8.h"
 
 #include <algorithm>
 #include <bitset>

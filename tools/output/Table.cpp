@@ -2,7 +2,7 @@
 
 #include "tools/output/Table.h"
 
-#include "tools/output/Utf8.h"
+#include "tools/output/PrintableText.h"
 
 #include <algorithm>
 #include <utility>

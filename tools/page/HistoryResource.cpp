@@ -67,7 +67,7 @@ Query parse(const Host::Http::RequestHead& head)
 }
 
 void append(std::string& json, const Query& query, const std::string& deviceId,
-    const Samples& samples, Slot newest)
+    const Samples& samples, SlotNumber newest)
 {
     json += json.empty() ? "" : ",\n";
     if (query.span == "day")
@@ -82,8 +82,8 @@ void append(std::string& json, const Query& query, const std::string& deviceId,
 std::string historyOf(const SensorHistory& history, const Query& query)
 {
     std::string sensors;
-    Slot end = 0;
-    const auto visit = [&](const std::string& deviceId, const Samples& samples, Slot newest) {
+    SlotNumber end = 0;
+    const auto visit = [&](const std::string& deviceId, const Samples& samples, SlotNumber newest) {
         append(sensors, query, deviceId, samples, newest);
         end = newest + 1;
     };
@@ -93,7 +93,7 @@ std::string historyOf(const SensorHistory& history, const Query& query)
         throw Problem(404, "nothing was recorded of the devices");
 
     const bool isOfMinutes = query.span == "day" || query.isThinned;
-    const Slot endOfMinutes = (minuteOf(end - 1) + 1) * secondsOfMinute;
+    const SlotNumber endOfMinutes = (minuteOf(end - 1) + 1) * secondsOfMinute;
     const int interval = isOfMinutes ? secondsOfMinute : secondsOfSlot;
     return R"({"span": ")" + query.span + R"(", "interval": )" + std::to_string(interval) +
            R"(, "end": )" +

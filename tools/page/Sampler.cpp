@@ -73,7 +73,7 @@ void Sampler::sample()
         const auto harvest = harvests_.get();
         const auto sensors = inListOrder(harvest->sensors);
         const auto now = SystemClock::now();
-        const Slot slot = SensorHistory::slotOf(now);
+        const SlotNumber slot = SensorHistory::slotOf(now);
         if (history_ != nullptr && std::exchange(slot_, slot) != slot)
             history_->add(sensors, now);
         if (feed_.hasSubscribers())

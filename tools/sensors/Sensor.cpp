@@ -43,9 +43,9 @@ std::optional<std::int64_t> integerOf(const Host::Value& value)
 
 // The properties of an instance. They are found fast when they are requested in the order in which
 // the provider sets them.
-class Properties {
+class PropertyLookup {
 public:
-    explicit Properties(const Host::Instance& instance)
+    explicit PropertyLookup(const Host::Instance& instance)
         : instance_(instance), next_(instance.properties().begin())
     {
     }
@@ -139,7 +139,7 @@ std::string Quantity::rounded() const
 
 Sensor::Sensor(const Host::Instance& from) : instance(&from)
 {
-    Properties properties(from);
+    PropertyLookup properties(from);
     const std::string_view id = properties.text("DeviceID");
     identify(properties.text("ElementName"), id);
     const std::string_view currentState = properties.text("CurrentState");

@@ -2,9 +2,9 @@
 
 #include "tools/watch/WatchView.h"
 
+#include "tools/output/PrintableText.h"
 #include "tools/output/SensorCells.h"
 #include "tools/output/Terminal.h"
-#include "tools/output/Utf8.h"
 #include "tools/sensors/NaturalOrder.h"
 #include "tools/watch/Sparkline.h"
 

@@ -15,30 +15,30 @@ bool isSet(std::optional<double> value)
     return value.value_or(0.0) != 0.0;
 }
 
-void storeReading(Channel& channel, std::optional<double> value)
+void storeReading(ChannelState& channel, std::optional<double> value)
 {
     channel.reading = value;
 }
 
-void storeFault(Channel& channel, std::optional<double> value)
+void storeFault(ChannelState& channel, std::optional<double> value)
 {
     channel.hasFault = isSet(value);
 }
 
-void storeEnable(Channel& channel, std::optional<double> value)
+void storeEnable(ChannelState& channel, std::optional<double> value)
 {
     if (value)
         channel.isEnabled = isSet(value);
 }
 
-template <std::optional<double> Limits::*Limit>
-void storeLimit(Channel& channel, std::optional<double> value)
+template <std::optional<double> ChannelLimits::*Limit>
+void storeLimit(ChannelState& channel, std::optional<double> value)
 {
     channel.limits.*Limit = value.value_or(std::numeric_limits<double>::quiet_NaN());
 }
 
 template <std::optional<bool> Alarms::*Alarm>
-void storeAlarm(Channel& channel, std::optional<double> value)
+void storeAlarm(ChannelState& channel, std::optional<double> value)
 {
     channel.alarms.*Alarm = isSet(value);
 }
@@ -46,18 +46,18 @@ void storeAlarm(Channel& channel, std::optional<double> value)
 constexpr auto meanings = std::to_array<AttributeMeaning>({
     {SENSORS_SUBFEATURE_FAN_INPUT, 1.0, storeReading},
     {SENSORS_SUBFEATURE_FAN_FAULT, 1.0, storeFault},
-    {SENSORS_SUBFEATURE_FAN_MIN, 1.0, storeLimit<&Limits::min>},
-    {SENSORS_SUBFEATURE_FAN_MAX, 1.0, storeLimit<&Limits::max>},
+    {SENSORS_SUBFEATURE_FAN_MIN, 1.0, storeLimit<&ChannelLimits::min>},
+    {SENSORS_SUBFEATURE_FAN_MAX, 1.0, storeLimit<&ChannelLimits::max>},
     {SENSORS_SUBFEATURE_FAN_ALARM, 1.0, storeAlarm<&Alarms::plain>},
     {SENSORS_SUBFEATURE_FAN_MIN_ALARM, 1.0, storeAlarm<&Alarms::min>},
     {SENSORS_SUBFEATURE_FAN_MAX_ALARM, 1.0, storeAlarm<&Alarms::max>},
 
     {SENSORS_SUBFEATURE_IN_INPUT, 1000.0, storeReading},
     {SENSORS_SUBFEATURE_IN_AVERAGE, 1000.0, storeReading},
-    {SENSORS_SUBFEATURE_IN_MIN, 1000.0, storeLimit<&Limits::min>},
-    {SENSORS_SUBFEATURE_IN_MAX, 1000.0, storeLimit<&Limits::max>},
-    {SENSORS_SUBFEATURE_IN_LCRIT, 1000.0, storeLimit<&Limits::lcrit>},
-    {SENSORS_SUBFEATURE_IN_CRIT, 1000.0, storeLimit<&Limits::crit>},
+    {SENSORS_SUBFEATURE_IN_MIN, 1000.0, storeLimit<&ChannelLimits::min>},
+    {SENSORS_SUBFEATURE_IN_MAX, 1000.0, storeLimit<&ChannelLimits::max>},
+    {SENSORS_SUBFEATURE_IN_LCRIT, 1000.0, storeLimit<&ChannelLimits::lcrit>},
+    {SENSORS_SUBFEATURE_IN_CRIT, 1000.0, storeLimit<&ChannelLimits::crit>},
     {SENSORS_SUBFEATURE_IN_ALARM, 1.0, storeAlarm<&Alarms::plain>},
     {SENSORS_SUBFEATURE_IN_MIN_ALARM, 1.0, storeAlarm<&Alarms::min>},
     {SENSORS_SUBFEATURE_IN_MAX_ALARM, 1.0, storeAlarm<&Alarms::max>},
@@ -66,11 +66,11 @@ constexpr auto meanings = std::to_array<AttributeMeaning>({
 
     {SENSORS_SUBFEATURE_TEMP_INPUT, 1000.0, storeReading},
     {SENSORS_SUBFEATURE_TEMP_FAULT, 1.0, storeFault},
-    {SENSORS_SUBFEATURE_TEMP_MIN, 1000.0, storeLimit<&Limits::min>},
-    {SENSORS_SUBFEATURE_TEMP_MAX, 1000.0, storeLimit<&Limits::max>},
-    {SENSORS_SUBFEATURE_TEMP_LCRIT, 1000.0, storeLimit<&Limits::lcrit>},
-    {SENSORS_SUBFEATURE_TEMP_CRIT, 1000.0, storeLimit<&Limits::crit>},
-    {SENSORS_SUBFEATURE_TEMP_EMERGENCY, 1000.0, storeLimit<&Limits::emergency>},
+    {SENSORS_SUBFEATURE_TEMP_MIN, 1000.0, storeLimit<&ChannelLimits::min>},
+    {SENSORS_SUBFEATURE_TEMP_MAX, 1000.0, storeLimit<&ChannelLimits::max>},
+    {SENSORS_SUBFEATURE_TEMP_LCRIT, 1000.0, storeLimit<&ChannelLimits::lcrit>},
+    {SENSORS_SUBFEATURE_TEMP_CRIT, 1000.0, storeLimit<&ChannelLimits::crit>},
+    {SENSORS_SUBFEATURE_TEMP_EMERGENCY, 1000.0, storeLimit<&ChannelLimits::emergency>},
     {SENSORS_SUBFEATURE_TEMP_ALARM, 1.0, storeAlarm<&Alarms::plain>},
     {SENSORS_SUBFEATURE_TEMP_MIN_ALARM, 1.0, storeAlarm<&Alarms::min>},
     {SENSORS_SUBFEATURE_TEMP_MAX_ALARM, 1.0, storeAlarm<&Alarms::max>},

@@ -17,7 +17,7 @@ struct AttributeMeaning {
     sensors_subfeature_type type;
     double divisor; // of the kernel's number, which gives the value in the unit of the reading
     // Stores a value of the attribute; none when it could not be read.
-    void (*store)(Channel& channel, std::optional<double> value);
+    void (*store)(ChannelState& channel, std::optional<double> value);
 };
 
 // Returns a null pointer for a type that means nothing for its channel.

@@ -60,9 +60,9 @@ std::optional<double> valueOf(
 
 } // namespace
 
-Channel readChannel(const Chip& chip, int folder, const Feature& feature)
+ChannelState readChannel(const Chip& chip, int folder, const Feature& feature)
 {
-    Channel channel;
+    ChannelState channel;
     for (const Attribute& attribute : feature.attributes) {
         std::optional<double> value = valueOf(attribute, chip, folder, feature);
         if (value && feature.type == NodeLexicon::NodeType::Voltage)

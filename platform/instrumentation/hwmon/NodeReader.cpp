@@ -33,7 +33,7 @@ NodeReader::NodeReader(std::shared_ptr<const Catalogue> catalogue)
 NodeReading NodeReader::read(const Feature& feature)
 {
     const Chip& chip = catalogue_->chips[feature.chip];
-    const Channel channel = readChannel(chip, folderOf(chip), feature);
+    const ChannelState channel = readChannel(chip, folderOf(chip), feature);
     NodeReading values;
     if (!channel.reading && folderId(chip.path) != chip.id) {
         values.status = NodeStatus::lostCommunication;

@@ -39,9 +39,9 @@ bool isAtOrBelow(double reading, const std::optional<double>& limit)
 
 } // namespace
 
-Limits withoutUnset(const Limits& limits)
+ChannelLimits withoutUnset(const ChannelLimits& limits)
 {
-    Limits set = limits;
+    ChannelLimits set = limits;
     if (isUnset(limits.min) && isUnset(limits.max))
         set.min = set.max = std::nullopt;
     if (isUnset(limits.lcrit) && isUnset(limits.crit))
@@ -55,14 +55,14 @@ Limits withoutUnset(const Limits& limits)
     return set;
 }
 
-unsigned statusOf(const Channel& channel)
+unsigned statusOf(const ChannelState& channel)
 {
     if (channel.hasFault || !channel.reading)
         return lostCommunication;
     if (!channel.isEnabled.value_or(true))
         return disabled;
     const double reading = *channel.reading;
-    const Limits& limits = channel.limits;
+    const ChannelLimits& limits = channel.limits;
     const Alarms& alarms = channel.alarms;
     if (isRaised(alarms.emergency) || isRaised(alarms.crit) || isAtOrAbove(reading, limits.crit))
         return criticalHigh;
@@ -76,9 +76,9 @@ unsigned statusOf(const Channel& channel)
     return isRaised(alarms.plain) ? warning : normal;
 }
 
-std::vector<unsigned> possibleStatesOf(const Channel& channel)
+std::vector<unsigned> possibleStatesOf(const ChannelState& channel)
 {
-    const Limits& limits = channel.limits;
+    const ChannelLimits& limits = channel.limits;
     const Alarms& alarms = channel.alarms;
     std::vector<unsigned> states;
     states.reserve(7);

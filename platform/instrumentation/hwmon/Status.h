@@ -9,9 +9,9 @@
 
 namespace Vorn::Hwmon {
 
-// Limits in the unit of the reading. The kernel's Documentation/hwmon/sysfs-interface.rst defines
-// each attribute.
-struct Limits {
+// The limits of a channel in the unit of the reading. The kernel's
+// Documentation/hwmon/sysfs-interface.rst defines each attribute.
+struct ChannelLimits {
     std::optional<double> min = {};
     std::optional<double> max = {};
     std::optional<double> lcrit = {};
@@ -29,11 +29,12 @@ struct Alarms {
     std::optional<bool> emergency = {};
 };
 
-struct Channel {
+// The values of the attributes of a channel.
+struct ChannelState {
     bool hasFault = false;
     std::optional<bool> isEnabled = {}; // absent when it cannot be switched off
     std::optional<double> reading = {}; // absent when it cannot be read
-    Limits limits = {};
+    ChannelLimits limits = {};
     Alarms alarms = {};
 };
 
@@ -42,14 +43,14 @@ struct Channel {
 // emergency limit of 0. Where one end is set, a 0 of the other is a limit: 0 V below a positive
 // maximum. An end that cannot be read, NaN here and absent in the result, may be set: a 0 of the
 // other stays.
-Limits withoutUnset(const Limits& limits);
+ChannelLimits withoutUnset(const ChannelLimits& limits);
 
 // Returns the status code of the node. REQUIRES: the limits are withoutUnset().
-unsigned statusOf(const Channel& channel);
+unsigned statusOf(const ChannelState& channel);
 
 // Returns the codes that statusOf() can return for a channel with these limits and alarms,
 // ascending, without that of lost communication (13), which is no state of the sensor. REQUIRES:
 // the limits are withoutUnset().
-std::vector<unsigned> possibleStatesOf(const Channel& channel);
+std::vector<unsigned> possibleStatesOf(const ChannelState& channel);
 
 } // namespace Vorn::Hwmon

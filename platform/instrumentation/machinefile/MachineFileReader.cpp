@@ -130,7 +130,7 @@ Json parsed(std::string_view text)
 }
 
 // Why a value is refused, and the place of that value below the one that is being read.
-struct Refusal {
+struct RefusedValue {
     std::string reason;
     Json::json_pointer place{};
 };
@@ -142,7 +142,7 @@ void readPart(const Step& step, ReadPart read)
 {
     try {
         read();
-    } catch (Refusal& refusal) {
+    } catch (RefusedValue& refusal) {
         refusal.place = Json::json_pointer() / step / refusal.place;
         throw;
     }
@@ -159,7 +159,7 @@ std::string described(const Json& value)
 
 [[noreturn]] void refuse(const std::string& expected, const Json& found)
 {
-    throw Refusal{"expected " + expected + ", found " + described(found)};
+    throw RefusedValue{"expected " + expected + ", found " + described(found)};
 }
 
 // Returns a value of one of the types in which the parser keeps values.
@@ -175,7 +175,7 @@ void read(const Json& value, std::string& text)
 {
     text = require<std::string>(value, "a string");
     if (text.find('\0') != std::string::npos)
-        throw Refusal{"the string holds the character NUL"};
+        throw RefusedValue{"the string holds the character NUL"};
 }
 
 void read(const Json& value, NodeLexicon::NodeType& type)
@@ -234,7 +234,7 @@ void readMembers(const Json& value, VisitFields visitFields)
     for (auto member = members.begin(); member != members.end(); ++member) {
         readPart(member->first, [&] {
             if (members.find(member->first) != member)
-                throw Refusal{"the member is there twice"};
+                throw RefusedValue{"the member is there twice"};
             bool isKnown = false;
             visitFields([&](std::string_view name, auto& field) {
                 if (name != member->first)
@@ -243,7 +243,7 @@ void readMembers(const Json& value, VisitFields visitFields)
                 read(member->second, field);
             });
             if (!isKnown)
-                throw Refusal{"there is no such member"};
+                throw RefusedValue{"there is no such member"};
         });
     }
 }
@@ -252,7 +252,7 @@ void requireMembers(const Json& object, std::initializer_list<std::string_view> 
 {
     for (const std::string_view name : names)
         if (!object.contains(name))
-            throw Refusal{"member \"" + std::string(name) + "\" is missing"};
+            throw RefusedValue{"member \"" + std::string(name) + "\" is missing"};
 }
 
 void read(const Json& value, MachineFileNode& node)
@@ -272,8 +272,8 @@ void read(const Json& value, std::vector<MachineFileNode>& nodes)
         const std::size_t index = indices.size();
         const auto [known, isNew] = indices.try_emplace(node.path, index);
         if (!isNew)
-            throw Refusal{quote(node.path) + " is the path of /nodes/" +
-                              std::to_string(known->second) + " already",
+            throw RefusedValue{quote(node.path) + " is the path of /nodes/" +
+                                   std::to_string(known->second) + " already",
                 Json::json_pointer() / index / "path"};
     }
 }
@@ -293,7 +293,7 @@ MachineFile fileOf(const Json& value)
         return {std::move(nodes)};
     requireMembers(value, {Member::period, Member::time});
     if (*period <= 0)
-        throw Refusal{"the period is not above 0", Json::json_pointer("/period")};
+        throw RefusedValue{"the period is not above 0", Json::json_pointer("/period")};
     return {std::move(nodes), Renewal{*period, *time}};
 }
 
@@ -304,7 +304,7 @@ MachineFile readMachineFile(std::string_view text)
     const Json value = parsed(text);
     try {
         return fileOf(value);
-    } catch (const Refusal& refusal) {
+    } catch (const RefusedValue& refusal) {
         const std::string place = excerpt(refusal.place.to_string());
         throw std::runtime_error((place.empty() ? "the document" : place) + ": " + refusal.reason);
     }

@@ -82,7 +82,7 @@ TEST(DemoModelTest, IsConsistent)
 {
     for (const SeenNode& node : demoMachine()) {
         const Vorn::NodeReading& values = node.values;
-        const Vorn::Hwmon::Channel channel{.isEnabled = values.status != 16,
+        const Vorn::Hwmon::ChannelState channel{.isEnabled = values.status != 16,
             .reading = values.reading,
             .limits = {.min = values.lowerNonCritical,
                 .max = values.upperNonCritical,

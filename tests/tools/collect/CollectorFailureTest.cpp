@@ -8,9 +8,9 @@
 
 namespace CollectorFailureTests {
 
+using Ipmi::AddressedCommand;
 using Ipmi::Bytes;
 using Ipmi::Collector;
-using Ipmi::Command;
 using Ipmi::CommandCode;
 using std::chrono::milliseconds;
 using Testing::allThresholds;
@@ -25,7 +25,8 @@ TEST_F(CollectorFailureTest, KeepsTheThresholdsWhereTheControllerFails)
 {
     pass(controller_);
     for (const int code : {0xC3, 0xD5}) {
-        controller_.override = [&](const Command& command, milliseconds) -> std::optional<Bytes> {
+        controller_.override = [&](const AddressedCommand& command,
+                                   milliseconds) -> std::optional<Bytes> {
             if (command.code == CommandCode::getSensorThresholds)
                 return Bytes{static_cast<std::uint8_t>(code)};
             return std::nullopt;
@@ -39,7 +40,8 @@ TEST_F(CollectorFailureTest, ASensorWhoseFactorsCannotBeReadNowIsLost)
     SimulatedSensor curve = temperature("Curve", 1);
     curve.linearization = 0x70;
     FakeController controller({curve});
-    controller.override = [](const Command& command, milliseconds) -> std::optional<Bytes> {
+    controller.override = [](const AddressedCommand& command,
+                              milliseconds) -> std::optional<Bytes> {
         if (command.code == CommandCode::getSensorReadingFactors)
             return Bytes{0xC3};
         return std::nullopt;
@@ -51,7 +53,8 @@ TEST_F(CollectorFailureTest, ASensorWhoseFactorsCannotBeReadNowIsLost)
 TEST_F(CollectorFailureTest, RepeatsCommandsToABusyControllerTwice)
 {
     int busy = 2;
-    controller_.override = [&](const Command& command, milliseconds) -> std::optional<Bytes> {
+    controller_.override = [&](const AddressedCommand& command,
+                               milliseconds) -> std::optional<Bytes> {
         if (command.code == CommandCode::getSensorReading && busy-- > 0)
             return Bytes{0xC0};
         return std::nullopt;
@@ -69,7 +72,8 @@ TEST_F(CollectorFailureTest, ASatelliteThatDoesNotAnswerIsAskedOnce)
     first.owner = second.owner = 0x2C;
     FakeController controller({first, second, temperature("C", 1)});
     std::size_t asked = 0;
-    controller.override = [&](const Command& command, milliseconds) -> std::optional<Bytes> {
+    controller.override = [&](const AddressedCommand& command,
+                              milliseconds) -> std::optional<Bytes> {
         if (command.responder.isBmc)
             return std::nullopt;
         ++asked;
@@ -88,7 +92,8 @@ TEST_F(CollectorFailureTest, AFailureOfOneSensorOfASatelliteLosesThatSensor)
     first.owner = second.owner = 0x2C;
     FakeController controller({first, second});
     std::uint8_t code = 0;
-    controller.override = [&](const Command& command, milliseconds) -> std::optional<Bytes> {
+    controller.override = [&](const AddressedCommand& command,
+                              milliseconds) -> std::optional<Bytes> {
         if (command.code == CommandCode::getSensorReading && command.data[0] == 1)
             return Bytes{code};
         return std::nullopt;
@@ -106,7 +111,7 @@ TEST_F(CollectorFailureTest, ASilentControllerEndsThePass)
     controller_.commands.clear();
     std::vector<milliseconds> timeouts;
     constexpr milliseconds delay{200};
-    controller_.override = [&](const Command& command,
+    controller_.override = [&](const AddressedCommand& command,
                                milliseconds timeout) -> std::optional<Bytes> {
         if (command.code == CommandCode::getSdrRepositoryInfo)
             return std::nullopt;
@@ -137,7 +142,8 @@ TEST_F(CollectorFailureTest, ASensorAtWhichTheControllerFallsSilentLosesTheOther
 {
     bool isHung = false;
     bool isFaulty = true;
-    controller_.override = [&](const Command& command, milliseconds) -> std::optional<Bytes> {
+    controller_.override = [&](const AddressedCommand& command,
+                               milliseconds) -> std::optional<Bytes> {
         const bool isForSensor = command.code != CommandCode::getSdr && command.data.size() == 1;
         isHung = isFaulty && (isForSensor ? command.data[0] == 1 : isHung);
         if (isHung && (isForSensor || command.code == CommandCode::getDeviceId))
@@ -159,7 +165,8 @@ TEST_F(CollectorFailureTest, ASensorAtWhichTheControllerFallsSilentLosesTheOther
 TEST_F(CollectorFailureTest, ASensorAtWhichTheWholeControllerHungIsReadAgainWithTheOthers)
 {
     pass(controller_);
-    controller_.override = [](const Command& command, milliseconds) -> std::optional<Bytes> {
+    controller_.override = [](const AddressedCommand& command,
+                               milliseconds) -> std::optional<Bytes> {
         if (command.code == CommandCode::getSensorReading ||
             command.code == CommandCode::getDeviceId)
             return Bytes{};

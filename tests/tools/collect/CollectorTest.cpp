@@ -6,9 +6,9 @@
 
 namespace CollectorTests {
 
+using Ipmi::AddressedCommand;
 using Ipmi::Bytes;
 using Ipmi::Collector;
-using Ipmi::Command;
 using Ipmi::CommandCode;
 using std::chrono::milliseconds;
 using Testing::allThresholds;
@@ -23,7 +23,8 @@ TEST_F(CollectorTest, ReadsThresholdsAgainInTurn)
 {
     collector_.pass(controller_, allThresholds);
     EXPECT_EQ(collector_.nodes().at(0).values.lowerFatal, 3);
-    controller_.override = [](const Command& command, milliseconds) -> std::optional<Bytes> {
+    controller_.override = [](const AddressedCommand& command,
+                               milliseconds) -> std::optional<Bytes> {
         if (command.code == CommandCode::getSensorThresholds)
             return Bytes{0, 0x08, 0, 0, 0, 70, 0, 0};
         return std::nullopt;
@@ -54,7 +55,8 @@ TEST_F(CollectorTest, ReadsMoreThresholdsInAPassWhereThereAreFewerPasses)
 TEST_F(CollectorTest, TakesTheThresholdsOfTheRecordWhereTheControllerHasNone)
 {
     for (const Bytes& answer : {Bytes{0xC1}, Bytes{0xCC}, Bytes{0, 8, 1}}) {
-        controller_.override = [&](const Command& command, milliseconds) -> std::optional<Bytes> {
+        controller_.override = [&](const AddressedCommand& command,
+                                   milliseconds) -> std::optional<Bytes> {
             return command.code == CommandCode::getSensorThresholds ? std::optional(answer)
                                                                     : std::nullopt;
         };
@@ -67,7 +69,8 @@ TEST_F(CollectorTest, RequestsFactorsThatDependOnTheReadingOnce)
     SimulatedSensor curve = temperature("Curve", 1);
     curve.linearization = 0x70;
     FakeController controller({curve});
-    controller.override = [](const Command& command, milliseconds) -> std::optional<Bytes> {
+    controller.override = [](const AddressedCommand& command,
+                              milliseconds) -> std::optional<Bytes> {
         if (command.code != CommandCode::getSensorReadingFactors)
             return std::nullopt;
         const int m = command.data[1] < 50 ? 1 : 2;
@@ -104,7 +107,8 @@ TEST_F(CollectorTest, AFanThatStandsTurnsAtZeroWhereTheControllerSaysThatItIsSlo
 {
     FakeController controller({reciprocalFan()});
     Bytes answer;
-    controller.override = [&](const Command& command, milliseconds) -> std::optional<Bytes> {
+    controller.override = [&](const AddressedCommand& command,
+                              milliseconds) -> std::optional<Bytes> {
         return command.code == CommandCode::getSensorReading ? std::optional(answer) : std::nullopt;
     };
     answer = {0, 80, 0x40, 0xC0};
@@ -129,7 +133,8 @@ TEST_F(CollectorTest, AFanThatStandsTurnsAtZeroWhereTheControllerSaysThatItIsSlo
 TEST_F(CollectorTest, ASensorThatWasNeverThereIsNotPresent)
 {
     bool isThere = false;
-    controller_.override = [&](const Command& command, milliseconds) -> std::optional<Bytes> {
+    controller_.override = [&](const AddressedCommand& command,
+                               milliseconds) -> std::optional<Bytes> {
         if (command.code == CommandCode::getSensorReading && command.data[0] == 1 && !isThere)
             return Bytes{0xCB};
         return std::nullopt;
@@ -151,7 +156,8 @@ TEST_F(CollectorTest, ReadsDiscreteSensorsWhereThatIsWanted)
     SimulatedSensor discrete = temperature("Discrete", 1);
     discrete.eventType = 0x6F;
     FakeController controller({discrete});
-    controller.override = [](const Command& command, milliseconds) -> std::optional<Bytes> {
+    controller.override = [](const AddressedCommand& command,
+                              milliseconds) -> std::optional<Bytes> {
         if (command.code == CommandCode::getSensorReading)
             return Bytes{0, 100, 0x40, 0xFF};
         return std::nullopt;

@@ -17,9 +17,9 @@
 
 namespace Testing {
 
+using Ipmi::AddressedCommand;
 using Ipmi::Bytes;
 using Ipmi::Collector;
-using Ipmi::Command;
 using Ipmi::CommandCode;
 using std::chrono::milliseconds;
 
@@ -35,7 +35,7 @@ public:
             records.push_back(recordOf(sensor));
     }
 
-    Bytes send(const Command& command, milliseconds timeout) override
+    Bytes send(const AddressedCommand& command, milliseconds timeout) override
     {
         commands.push_back(command.code);
         if (override)
@@ -44,7 +44,7 @@ public:
         return answer(command);
     }
 
-    Bytes answer(const Command& command)
+    Bytes answer(const AddressedCommand& command)
     {
         switch (command.code) {
         case CommandCode::getDeviceId:
@@ -77,7 +77,7 @@ public:
     std::uint8_t codeOfTooMany = 0xCA;
     std::vector<CommandCode> commands;
     // Returns the answer to some commands; an empty one means silence.
-    std::function<std::optional<Bytes>(const Command&, milliseconds)> override;
+    std::function<std::optional<Bytes>(const AddressedCommand&, milliseconds)> override;
 
 private:
     Bytes recordPart(const Bytes& request) const

@@ -6,9 +6,9 @@
 
 namespace SdrRepositoryTests {
 
+using Ipmi::AddressedCommand;
 using Ipmi::Bytes;
 using Ipmi::Collector;
-using Ipmi::Command;
 using Ipmi::CommandCode;
 using std::chrono::milliseconds;
 using Testing::allThresholds;
@@ -50,7 +50,8 @@ TEST_F(SdrRepositoryTest, ReadsRecordsInPiecesThatTheControllerCanReturn)
 TEST_F(SdrRepositoryTest, ReservesTheRepositoryAgainWhenAnotherReaderHasDoneSo)
 {
     int count = 0;
-    controller_.override = [&](const Command& command, milliseconds) -> std::optional<Bytes> {
+    controller_.override = [&](const AddressedCommand& command,
+                               milliseconds) -> std::optional<Bytes> {
         if (command.code == CommandCode::getSdr && ++count % 4 == 0)
             ++controller_.reservation;
         return std::nullopt;
@@ -59,7 +60,8 @@ TEST_F(SdrRepositoryTest, ReservesTheRepositoryAgainWhenAnotherReaderHasDoneSo)
     EXPECT_GT(controller_.count(CommandCode::reserveSdrRepository), 1U);
 
     controller_.records.clear(); // changes the repository
-    controller_.override = [&](const Command& command, milliseconds) -> std::optional<Bytes> {
+    controller_.override = [&](const AddressedCommand& command,
+                               milliseconds) -> std::optional<Bytes> {
         if (command.code == CommandCode::getSdr)
             return Bytes{0xC5};
         return std::nullopt;
@@ -71,7 +73,8 @@ TEST_F(SdrRepositoryTest, ReservesTheRepositoryAgainWhenAnotherReaderHasDoneSo)
 TEST_F(SdrRepositoryTest, BeginsARecordAgainThatAnotherReaderMayHaveChanged)
 {
     int count = 0;
-    controller_.override = [&](const Command& command, milliseconds) -> std::optional<Bytes> {
+    controller_.override = [&](const AddressedCommand& command,
+                               milliseconds) -> std::optional<Bytes> {
         if (command.code == CommandCode::getSdr && ++count == 2) { // after the header
             controller_.records[0] = Testing::recordOf(temperature("A longer name", 1));
             ++controller_.reservation;
@@ -83,10 +86,11 @@ TEST_F(SdrRepositoryTest, BeginsARecordAgainThatAnotherReaderMayHaveChanged)
 
 TEST_F(SdrRepositoryTest, AcceptsFewerBytesThanItAsksFor)
 {
-    controller_.override = [&](const Command& command, milliseconds) -> std::optional<Bytes> {
+    controller_.override = [&](const AddressedCommand& command,
+                               milliseconds) -> std::optional<Bytes> {
         if (command.code != CommandCode::getSdr || command.data[5] <= 10)
             return std::nullopt;
-        Command shorter = command;
+        AddressedCommand shorter = command;
         shorter.data[5] = 10;
         return controller_.answer(shorter);
     };
@@ -95,7 +99,8 @@ TEST_F(SdrRepositoryTest, AcceptsFewerBytesThanItAsksFor)
 
 TEST_F(SdrRepositoryTest, EndsWhereTheRecordsLeadInACircle)
 {
-    controller_.override = [&](const Command& command, milliseconds) -> std::optional<Bytes> {
+    controller_.override = [&](const AddressedCommand& command,
+                               milliseconds) -> std::optional<Bytes> {
         if (command.code != CommandCode::getSdr)
             return std::nullopt;
         const std::string& record = controller_.records[0];
@@ -110,7 +115,7 @@ TEST_F(SdrRepositoryTest, EndsWhereTheRecordsLeadInACircle)
 
 TEST_F(SdrRepositoryTest, AControllerWithoutARepositoryIsAnError)
 {
-    controller_.override = [](const Command&, milliseconds) -> std::optional<Bytes> {
+    controller_.override = [](const AddressedCommand&, milliseconds) -> std::optional<Bytes> {
         return Bytes{0xC1};
     };
     EXPECT_THAT(Testing::errorOf([this] { pass(controller_); }),

@@ -14,9 +14,9 @@ namespace Vorn::Companion {
 // The functions return objects of the broker, or none where no provider serves the class in the
 // namespace. They throw RequestFailure, with the code and the message of the object manager, when
 // it fails in another way.
-class Upcalls {
+class ProviderUpcalls {
 public:
-    Upcalls(const CMPIBroker* broker, const CMPIContext* context)
+    ProviderUpcalls(const CMPIBroker* broker, const CMPIContext* context)
         : broker_(broker), context_(context)
     {
     }

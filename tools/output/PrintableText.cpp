@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-#include "tools/output/Utf8.h"
+#include "tools/output/PrintableText.h"
 
 #include "platform/text/Utf8.h"
 

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-#include "companion/Upcalls.h"
+#include "companion/ProviderUpcalls.h"
 
 #include "companion/ProviderTables.h"
 #include "platform/utilities/ProviderUtilities.h"
@@ -36,8 +36,8 @@ CMPIObjectPath* inNameSpace(CMPIObjectPath* path, const std::string& nameSpace)
 } // namespace
 
 template <typename Enumerate>
-std::vector<CMPIValue> Upcalls::elements(const std::string& nameSpace, const char* className,
-    CMPIType type, const Enumerate& enumerate) const
+std::vector<CMPIValue> ProviderUpcalls::elements(const std::string& nameSpace,
+    const char* className, CMPIType type, const Enumerate& enumerate) const
 {
     const CMPIObjectPath* const path =
         newPathIn(broker_, nameSpace.c_str(), className, getSystemName());
@@ -59,7 +59,7 @@ std::vector<CMPIValue> Upcalls::elements(const std::string& nameSpace, const cha
     return found;
 }
 
-std::vector<CMPIObjectPath*> Upcalls::names(
+std::vector<CMPIObjectPath*> ProviderUpcalls::names(
     const std::string& nameSpace, const char* className) const
 {
     const auto enumerate = [this](const CMPIObjectPath* path, CMPIStatus* status) {
@@ -72,7 +72,7 @@ std::vector<CMPIObjectPath*> Upcalls::names(
     return paths;
 }
 
-std::vector<CMPIInstance*> Upcalls::instances(
+std::vector<CMPIInstance*> ProviderUpcalls::instances(
     const std::string& nameSpace, const char* className, const char** properties) const
 {
     const auto enumerate = [&](const CMPIObjectPath* path, CMPIStatus* status) {
