@@ -204,7 +204,7 @@ TEST_F(ServeProcessTest, AllocatorKeepsManyBlocksUnlessTheUserConfiguresIt)
         return contentOf("/proc/" + std::to_string(server.id()) + "/environ");
     };
     EXPECT_THAT(environmentOf(ServerProcess(withModel())),
-        HasSubstr("GLIBC_TUNABLES=glibc.malloc.tcache_count=2000"));
+        HasSubstr("GLIBC_TUNABLES=glibc.malloc.tcache_count=1000"));
     const std::string own = "glibc.malloc.tcache_count=9";
     EXPECT_THAT(environmentOf(ServerProcess(withModel(), {{"GLIBC_TUNABLES", own}})),
         HasSubstr("GLIBC_TUNABLES=" + own));
