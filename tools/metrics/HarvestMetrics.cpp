@@ -29,6 +29,7 @@ void addHarvest(Exposition& exposition, const Harvest& harvest, SensorMetrics& s
     sensors.addTo(exposition, harvest.sensors);
     exposition.add(duration, {{{}, harvest.duration.count()}});
     std::vector<Series> kinds;
+    kinds.reserve(sensorKinds.size());
     for (const std::string_view kind : sensorKinds)
         kinds.push_back({Labels().add("kind", kind),
             static_cast<double>(std::ranges::count(harvest.sensors, kind, &Sensor::kind))});
