@@ -45,7 +45,7 @@ public:
         const Harvest harvest =
             readHarvest(ProviderClient(source_.sensorProviderFile()).manager(), devices);
         Exposition exposition(ExpositionForm::text);
-        SensorMetrics sensors(0); // once
+        SensorMetrics sensors(0); // there is no further exposition
         addHarvest(exposition, harvest, sensors);
         if (compatible_ && readsHwmon())
             addHwmon(exposition);

@@ -16,7 +16,7 @@ namespace Tools {
 // A text for each sensor, one after the other, since they are read in this order.
 struct SensorTexts {
     std::string all;
-    std::vector<std::size_t> ends;
+    std::vector<std::size_t> ends; // in `all`
 
     bool operator==(const SensorTexts&) const = default;
 
