@@ -137,11 +137,11 @@ struct RefusedValue {
 
 // Calls a function that reads a part of a value. The name or the index of the part becomes the
 // first step to the place of a refusal.
-template <typename Step, typename ReadPart>
-void readPart(const Step& step, ReadPart read)
+template <typename Step, typename Function>
+void readPart(const Step& step, Function function)
 {
     try {
-        read();
+        function();
     } catch (RefusedValue& refusal) {
         refusal.place = Json::json_pointer() / step / refusal.place;
         throw;
