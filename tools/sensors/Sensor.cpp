@@ -164,7 +164,12 @@ Sensor::Sensor(const Host::Instance& from) : instance(&from)
 
 std::string deviceIdOf(const std::string& description, std::string_view path)
 {
-    return Vorn::stripSpaces(description + ":" + Text::escapeControls(Text::toValidUtf8(path)));
+    std::string id = description + ":";
+    // Most paths need no change, and each scrape has the identifiers of all sensors made.
+    const bool isPlain =
+        std::all_of(path.begin(), path.end(), [](char c) { return c >= ' ' && c <= '~'; });
+    id += isPlain ? std::string(path) : Text::escapeControls(Text::toValidUtf8(path));
+    return Vorn::stripSpaces(id);
 }
 
 void Sensor::setNames(const std::string& description, std::string_view itsPath)
