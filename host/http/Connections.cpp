@@ -28,6 +28,10 @@ bool hasClientFinished(int descriptor)
     return ::recv(descriptor, &next, 1, MSG_PEEK | MSG_DONTWAIT) == 0;
 }
 
+// New connections are closed after all others that are idle, since their clients may be sending the
+// first request or may be in a TLS handshake.
+constexpr std::chrono::seconds timeToBegin{2};
+
 // Returns whether the client has sent what the thread of the connection has yet to read.
 bool hasUnreadBytes(int descriptor)
 {
@@ -95,10 +99,12 @@ bool Connections::makeRoomAmong(const Counts& counts, std::size_t maximum)
     std::erase_if(counted, [](const ClientConnection* each) {
         return each->phase != Phase::idle || hasUnreadBytes(each->descriptor);
     });
-    const auto found = std::min_element(counted.begin(), counted.end(),
-        [](const ClientConnection* first, const ClientConnection* second) {
-            return std::tie(first->use, first->deadline) < std::tie(second->use, second->deadline);
-        });
+    const auto newSince = Clock::now() + timeoutOf(Phase::idle) - timeToBegin;
+    const auto rank = [newSince](const ClientConnection* each) {
+        const bool isNew = each->use == Use::nothing && each->deadline > newSince;
+        return std::tuple(isNew, each->use, each->deadline);
+    };
+    const auto found = std::ranges::min_element(counted, {}, rank);
     if (found == counted.end())
         return false;
     (*found)->isLeaving = true;

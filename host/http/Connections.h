@@ -116,7 +116,8 @@ private:
     std::chrono::seconds timeoutOf(Phase phase) const;
     // Returns whether there is room for one more connection of those that count, for which an idle
     // one of them is closed where need be (RFC 9112, 9.5): of those with the least use, the one
-    // that has been idle the longest. None is closed of which a request has arrived in part.
+    // that has been idle the longest, and new ones last. None is closed that has sent a request
+    // line or bytes that were not read yet.
     template <typename Counts>
     bool makeRoomAmong(const Counts& counts, std::size_t maximum);
     bool exceedsLimitsOfStreams(const ClientConnection& connection) const;

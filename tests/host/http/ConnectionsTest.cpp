@@ -69,12 +69,13 @@ TEST(ConnectionsTest, MakeRoomFirstWhereTheyHadTheLeastUse)
     };
     const std::vector<Phase> operation{
         Phase::receiving, Phase::working, Phase::answering, Phase::idle};
-    const auto* const operated = add(operation);
-    const auto* const operatedLater = add(operation);
-    const auto* const fetched =
-        add({Phase::receiving, Phase::working, Phase::fetching, Phase::idle});
-    const auto* const silent = add({});
-    const auto* const silentLater = add({});
+    auto* const operated = add(operation);
+    auto* const operatedLater = add(operation);
+    auto* const fetched = add({Phase::receiving, Phase::working, Phase::fetching, Phase::idle});
+    auto* const silent = add({});
+    auto* const silentLater = add({});
+    for (auto* const each : {silent, silentLater})
+        each->deadline -= std::chrono::seconds(3);
     const auto* const busy = add({Phase::receiving});
     for (const auto* const each : {silent, silentLater, fetched, operated, operatedLater}) {
         EXPECT_FALSE(each->isLeaving);
@@ -83,6 +84,22 @@ TEST(ConnectionsTest, MakeRoomFirstWhereTheyHadTheLeastUse)
     }
     EXPECT_EQ(connections.add(-1, someAddress, nullptr), nullptr);
     EXPECT_FALSE(busy->isLeaving);
+}
+
+TEST(ConnectionsTest, NewOneStaysWhereAnotherIsIdle)
+{
+    Host::Http::Limits limits;
+    limits.maximumConnections = 2;
+    Connections connections(limits);
+    ClientConnection* const operated = connections.add(-1, someAddress, nullptr);
+    connections.enter(*operated, Phase::answering);
+    connections.enter(*operated, Phase::idle);
+    const auto* const added = connections.add(-1, someAddress, nullptr);
+    EXPECT_NE(connections.add(-1, someAddress, nullptr), nullptr);
+    EXPECT_TRUE(operated->isLeaving);
+    EXPECT_FALSE(added->isLeaving);
+    EXPECT_NE(connections.add(-1, someAddress, nullptr), nullptr);
+    EXPECT_TRUE(added->isLeaving);
 }
 
 TEST(ConnectionsTest, RequestThatHasYetToBeReadKeepsItsConnection)
