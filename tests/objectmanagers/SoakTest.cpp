@@ -99,6 +99,7 @@ TEST(SoakTest, NothingFailsOrGrowsWhileAChipComesAndGoes)
         while (Clock::now() < end) {
             sysfs.rename("hwmon/hwmon2", "gone");
             std::this_thread::sleep_for(300ms);
+            sysfs.renew("gone");
             sysfs.rename("gone", "hwmon/hwmon2");
             std::this_thread::sleep_for(300ms);
         }

@@ -162,6 +162,15 @@ void BoundSysfs::rename(const std::string& from, const std::string& to)
     fs::rename(path(from), path(to));
 }
 
+void BoundSysfs::renew(const std::string& folder)
+{
+    const std::string copy = folder + ".copy";
+    fs::copy(
+        path(folder), path(copy), fs::copy_options::recursive | fs::copy_options::copy_symlinks);
+    remove(folder);
+    rename(copy, folder);
+}
+
 void BoundSysfs::addChip(const std::string& folder, const std::string& name, const std::string& bus,
     const std::string& address)
 {

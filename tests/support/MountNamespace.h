@@ -53,6 +53,8 @@ public:
     void write(const std::string& relative, const std::string& text);
     void remove(const std::string& relative);
     void rename(const std::string& from, const std::string& to);
+    // Gives the folder a new inode, as a chip has that the kernel registers again.
+    void renew(const std::string& folder);
 
     // Adds a chip on the bus at the address. Its only attribute is its name.
     void addChip(const std::string& folder, const std::string& name, const std::string& bus,

@@ -169,6 +169,7 @@ protected:
         while (Clock::now() < end) {
             sysfs_->rename("hwmon/hwmon2", "gone");
             std::this_thread::sleep_for(30ms);
+            sysfs_->renew("gone");
             sysfs_->rename("gone", "hwmon/hwmon2");
             std::this_thread::sleep_for(30ms);
         }

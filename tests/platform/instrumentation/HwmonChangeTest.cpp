@@ -194,6 +194,7 @@ TEST_P(HwmonChangeByOrderTest, EightThreadsReadWhileChipsComeAndGo)
     while (std::chrono::steady_clock::now() < end) {
         sysfs.rename(nvme, "unplugged");
         std::this_thread::sleep_for(std::chrono::milliseconds(5));
+        sysfs.renew("unplugged");
         sysfs.rename("unplugged", nvme);
         std::this_thread::sleep_for(std::chrono::milliseconds(5));
     }
