@@ -53,10 +53,10 @@ std::shared_ptr<const UnsentText> MetricsResource::write(ExpositionForm form)
     // From one text to the next, some numbers become longer.
     Exposition exposition(form, latestSize_ + latestSize_ / 64);
     auto harvest = harvests_.get();
-    const std::size_t sensors = harvest->sensors.size();
+    const std::size_t count = harvest->sensors.size();
     addHarvest(exposition, *harvest, sensors_);
     harvest.reset();
-    if (sensors >= largeAnswer)
+    if (count >= largeAnswer)
         ::malloc_trim(0);
     addMore_(exposition);
     std::string text = std::move(exposition).finish();

@@ -29,7 +29,7 @@ public:
     Host::Http::Representation represent(const Host::Http::RequestHead& head) override;
 
 private:
-    // The lines that are kept take up to 4 KiB for a sensor, and 25 MB for so many.
+    // The lines of 10,000 sensors take 25 MB.
     static constexpr std::size_t maximumKeptSensors = 10'000;
 
     std::shared_ptr<const UnsentText> write(ExpositionForm form);

@@ -142,7 +142,7 @@ void writeReadings(Exposition& exposition, const Sensors& sensors, const SensorF
     }
 }
 
-// Writes the families. Their lines are null where none are kept.
+// Writes the families. The lines of each are taken from what is kept, or made where that is null.
 void write(Exposition& exposition, const Sensors& sensors, const std::vector<SensorTexts>* kept)
 {
     for (std::size_t i = 0; i < families.size(); ++i) {

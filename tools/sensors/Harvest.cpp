@@ -126,7 +126,7 @@ Harvest readHarvest(const Host::Manager& manager, ChipDevices& devices)
     // read or breaks off.
     harvest.sources = statesOfSources(harvest.sensors, chips.get());
     // An attribute that is gone may still be in this list of the chips.
-    if (chips && !harvest.lostSources().empty())
+    if (chips && !harvest.sources.at("hwmon"))
         harvest.sources =
             statesOfSources(harvest.sensors, listChips(std::chrono::seconds(0)).get());
     harvest.duration = std::chrono::steady_clock::now() - begin;
