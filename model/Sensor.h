@@ -112,7 +112,8 @@ private:
     std::int32_t upperThresholdFatal_ = 0;
 };
 
-// It is defined outside of the class, since a vector would write zeros first otherwise.
+// The constructor is defined outside of the class: otherwise a vector would fill a new record with
+// zeros before it calls the constructor.
 inline Sensor::Sensor() = default;
 
 } // namespace Vorn::SensorProfileProvider

@@ -21,7 +21,7 @@ struct NameHash {
         std::uint64_t hash = 0xcbf29ce484222325; // FNV-1a
         for (const char c : name)
             hash = (hash ^ static_cast<unsigned char>(foldCase(c))) * 0x100000001b3;
-        return hash;
+        return static_cast<std::size_t>(hash);
     }
 };
 

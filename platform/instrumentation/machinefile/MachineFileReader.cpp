@@ -274,7 +274,7 @@ void read(const Json& value, std::vector<MachineFileNode>& nodes)
         if (!isNew)
             throw RefusedValue{quote(node.path) + " is the path of /nodes/" +
                                    std::to_string(known->second) + " already",
-                Json::json_pointer() / index / "path"};
+                Json::json_pointer() / index / std::string(Member::path)};
     }
 }
 
@@ -293,7 +293,8 @@ MachineFile fileOf(const Json& value)
         return {std::move(nodes)};
     requireMembers(value, {Member::period, Member::time});
     if (*period <= 0)
-        throw RefusedValue{"the period is not above 0", Json::json_pointer("/period")};
+        throw RefusedValue{
+            "the period is not above 0", Json::json_pointer() / std::string(Member::period)};
     return {std::move(nodes), Renewal{*period, *time}};
 }
 

@@ -66,9 +66,11 @@ TEST_F(DispatcherTest, PropertyListsArriveSpelledAsDeclaredAndWithoutWhatSaysNot
     ask("GetInstance", name + list({}));
     ask("GetInstance", name + list({"label", "Unheard", "LABEL", "unheard"}));
     ask("GetInstance", name + list({"Unheard", "Unseen"}));
+    ask("GetInstance", name + list({"since", "LABEL", "Since"}));
     ask("GetProperty", name + valueOf("PropertyName", "ISON"));
-    EXPECT_THAT(seen, ElementsAre(ElementsAre("all"), ElementsAre(), ElementsAre("Label"),
-                          ElementsAre("Unheard"), ElementsAre("IsOn")));
+    EXPECT_THAT(
+        seen, ElementsAre(ElementsAre("all"), ElementsAre(), ElementsAre("Label"),
+                  ElementsAre("Unheard"), ElementsAre("Since", "Label"), ElementsAre("IsOn")));
 }
 
 TEST_F(DispatcherTest, WithoutDeepInheritanceTheListEndsWithTheClass)
