@@ -52,6 +52,31 @@ remove_modules() {
   done
 }
 
+# Deletes our classes, in every namespace where they are left: associations first, since the classes
+# that they refer to must be known. The class of computer systems may be somebody else's where our
+# provider of it is not registered.
+remove_classes() {
+  local space spaces names each classes=(
+    ZUMLO_SensorElementConformsToProfile ZUMLO_SensorElementCapabilities ZUMLO_SensorSystemDevice
+    ZUMLO_SensorEnabledLogicalElementCapabilities ZUMLO_NumericSensor ZUMLO_SensorRegisteredProfile)
+  if ! has_commands cimcli; then
+    echo "The classes stay, since cimcli, which deletes them, is not installed. Without providers" \
+      "they do nothing."
+    return
+  fi
+  [[ " ${registered[*]} " != *" ${modules[-1]} "* ]] || classes+=(ZUMLO_ComputerSystem)
+  spaces=$(cimcli ns) || report_failure "failed with exit code $?: cimcli ns"
+  for space in $spaces; do
+    names=$(cimcli nc -di -n "$space") ||
+      report_failure "failed with exit code $?: cimcli nc -di -n $space"
+    for each in "${classes[@]}"; do
+      if grep --quiet --line-regexp --fixed-strings -- "$each" <<<"$names"; then
+        step cimcli dc "$each" -n "$space"
+      fi
+    done
+  done
+}
+
 openpegasus_register() {
   # -uc alone replaces a class of the same major version only.
   local each sensors=(-uc -aV) system=(-uc -aV)
@@ -82,4 +107,5 @@ openpegasus_remove() {
   find_registered_modules
   remove_modules
   unlink_libraries
+  remove_classes
 }

@@ -84,6 +84,25 @@ TEST_P(EveryRemovalStepOfOpenPegasusTest, CanFailAndBeRepeated)
 INSTANTIATE_TEST_SUITE_P(
     Steps, EveryRemovalStepOfOpenPegasusTest, testing::Range<std::size_t>(0, 5));
 
+TEST_F(OpenPegasusTest, DeletionOfClassesCanFailAndBeRepeated)
+{
+    const std::vector<std::pair<std::size_t, std::string>> failures = {{6, "cimcli ns"},
+        {7, "cimcli nc -di -n root/PG_InterOp"},
+        {8, "cimcli dc ZUMLO_SensorElementConformsToProfile -n root/PG_InterOp"}};
+    for (const auto& [call, command] : failures) {
+        mustRun({"register"});
+        calls();
+        failAt(call);
+        const Ended ended = runRegister({"remove"});
+        EXPECT_EQ(ended.code, 1);
+        EXPECT_THAT(ended.err, AllOf(HasSubstr("failed with exit code 7: " + command),
+                                   HasSubstr("the command can be repeated")));
+        failNoMore();
+        mustRun({"remove"});
+        EXPECT_THAT(classesIn("root/PG_InterOp"), IsEmpty());
+    }
+}
+
 TEST_F(OpenPegasusTest, AnUndoneRemovalIsARegistrationAsItWas)
 {
     mustRun({"register", "--namespace", "root/old", "--without-computer-system"});

@@ -52,8 +52,46 @@ TEST_F(OpenPegasusTest, RemovesTheProviders)
     EXPECT_THAT(calls(),
         ElementsAre("cimprovider -l", namespaceQuery_, "cimprovider -r -m SensorProfileModule",
             "cimprovider -r -m SensorProfileRegistrationModule",
-            "cimprovider -r -m SensorProfileComputerSystemModule"));
+            "cimprovider -r -m SensorProfileComputerSystemModule", "cimcli ns",
+            "cimcli nc -di -n root/PG_InterOp",
+            "cimcli dc ZUMLO_SensorElementConformsToProfile -n root/PG_InterOp",
+            "cimcli dc ZUMLO_SensorRegisteredProfile -n root/PG_InterOp",
+            "cimcli nc -di -n root/cimv2",
+            "cimcli dc ZUMLO_SensorElementConformsToProfile -n root/cimv2",
+            "cimcli dc ZUMLO_SensorElementCapabilities -n root/cimv2",
+            "cimcli dc ZUMLO_SensorSystemDevice -n root/cimv2",
+            "cimcli dc ZUMLO_SensorEnabledLogicalElementCapabilities -n root/cimv2",
+            "cimcli dc ZUMLO_NumericSensor -n root/cimv2",
+            "cimcli dc ZUMLO_ComputerSystem -n root/cimv2"));
     EXPECT_THAT(modules(), IsEmpty());
+}
+
+TEST_F(OpenPegasusTest, RemovesTheClassesFromEveryNamespace)
+{
+    mustRun({"register", "--namespace", "root/old"});
+    mustRun({"register", "--namespace", "root/new"});
+    folder_.write("classes/root/new/ZUMLO_Other", "");
+    mustRun({"remove"});
+    EXPECT_THAT(classesIn("root/old"), IsEmpty());
+    EXPECT_THAT(classesIn("root/new"), ElementsAre("ZUMLO_Other"));
+    EXPECT_THAT(classesIn("root/PG_InterOp"), IsEmpty());
+}
+
+// Somebody else may have defined it.
+TEST_F(OpenPegasusTest, LeavesTheClassOfComputerSystemsWhereItServesNone)
+{
+    mustRun({"register", "--without-computer-system"});
+    mustRun({"remove"});
+    EXPECT_THAT(classesIn("root/cimv2"), ElementsAre("ZUMLO_ComputerSystem"));
+}
+
+TEST_F(OpenPegasusTest, WithoutTheCommandThatDeletesThemTheClassesStay)
+{
+    mustRun({"register"});
+    fs::remove(path("bin/cimcli"));
+    EXPECT_THAT(mustRun({"remove"}),
+        AllOf(HasSubstr("The classes stay, since cimcli"), HasSubstr("Removed.")));
+    EXPECT_FALSE(classesIn("root/cimv2").empty());
 }
 
 // cimprovider removes a module from all its namespaces.
@@ -72,7 +110,7 @@ TEST_F(OpenPegasusTest, RemovesFromNoSingleNamespace)
 TEST_F(OpenPegasusTest, RemovesNothingWhereNothingIsRegistered)
 {
     EXPECT_THAT(mustRun({"remove"}), HasSubstr("nothing was changed"));
-    EXPECT_THAT(calls(), ElementsAre("cimprovider -l"));
+    EXPECT_THAT(calls(), ElementsAre("cimprovider -l", "cimcli ns"));
 }
 
 TEST_F(OpenPegasusTest, LinksTheLibrariesIntoTheFolderOfProviders)

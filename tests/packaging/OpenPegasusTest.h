@@ -18,6 +18,8 @@ protected:
 
     Lines modules() const { return linesOf(contentOf(path("modules"))); }
 
+    Lines classesIn(const std::string& space) const { return filesBelow(path("classes/" + space)); }
+
     // Returns the line that declares a class in the source that was compiled last.
     std::string definition(const std::string& name) const
     {
