@@ -90,7 +90,7 @@ TEST_F(SensorEnumerationTest, OneInstanceIsFoundByItsWholeIdentifier)
     EXPECT_EQ(property(*Host::Instance::of(instances_[0]), "ElementName"), "string \"Y\"");
 }
 
-// There are twenty duplicates, since std::sort keeps the order of a few records by chance.
+// Twenty sensors have one identifier.
 class DuplicateTest : public SensorEnumerationTest {
 protected:
     DuplicateTest() : SensorEnumerationTest(duplicates()) {}
