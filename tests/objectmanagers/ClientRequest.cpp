@@ -125,6 +125,16 @@ void addFiltered(std::vector<ClientRequest>& requests, const std::string& path)
         requests.push_back({.operation = "ri", .object = path, .properties = list});
 }
 
+// Adds what leads from the profile to its sensors. Object managers ask many providers where no
+// association is named, and not all of them have the same ones.
+void addConformance(std::vector<ClientRequest>& requests, const std::string& path)
+{
+    const std::string association = "ZUMLO_SensorElementConformsToProfile";
+    for (const std::string operation : {"ai", "ain", "ri", "rin"})
+        for (const std::string role : {"", "ConformantStandard", "ManagedElement", "No_Role"})
+            requests.push_back({operation, path, association, "", role});
+}
+
 } // namespace
 
 std::vector<std::string> ClientRequest::arguments(const std::string& url) const
@@ -164,6 +174,7 @@ std::vector<ClientRequest> allRequests(const PathsOf& pathsOf)
     addOtherPaths(requests, sensor);
     addRefused(requests, pathsOf(profile).at(0), "ElementName=x");
     addEmptyLists(requests, profile, pathsOf(profile).at(0));
+    addConformance(requests, pathsOf(profile).at(0));
     for (const std::string& name : instanceClasses) {
         const Texts paths = pathsOf(name);
         addRefused(requests, paths.at(0),
