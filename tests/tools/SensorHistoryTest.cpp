@@ -6,6 +6,8 @@
 
 #include <gmock/gmock.h>
 
+#include <map>
+
 namespace SensorHistoryTests {
 
 TEST_F(SensorHistoryTest, HourHasASampleOfTenSeconds)
@@ -115,6 +117,23 @@ TEST_F(SensorHistoryTest, SensorsThatAreGoneLongestMakeRoomForNewOnes)
     EXPECT_TRUE(hour("896").is_null());
     EXPECT_FALSE(hour("897").is_null());
     EXPECT_EQ(hour("a")["states"], json::parse(R"([["Normal", 360]])"));
+}
+
+TEST_F(SensorHistoryTest, ManyNewSensorsTakeThePlacesOfThoseGoneLongest)
+{
+    const auto sensorsNamed = [](const std::string& name, int count) {
+        std::vector<Sensor> sensors;
+        for (int i = 0; i < count; ++i)
+            sensors.push_back(sensorOf(name + std::to_string(i), 1));
+        return sensors;
+    };
+    add(sensorsNamed("first", 100), 0);
+    add(sensorsNamed("second", 100), 10);
+    add(sensorsNamed("third", 40), 20);
+    std::map<char, int> kept;
+    for (const std::string& deviceId : history.deviceIds())
+        ++kept[deviceId.front()];
+    EXPECT_EQ(kept, (std::map<char, int>{{'f', 40}, {'s', 100}, {'t', 40}}));
 }
 
 TEST_F(SensorHistoryTest, SensorsOfOneAnswerAreOfTheSameTime)
