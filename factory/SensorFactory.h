@@ -3,9 +3,9 @@
 #pragma once
 
 #include "factory/RequestTexts.h"
-#include "factory/SensorIndex.h"
 #include "model/Sensor.h"
 #include "model/SensorEnabledLogCap.h"
+#include "model/SensorIndex.h"
 
 #include <cmpidt.h>
 

@@ -23,6 +23,7 @@ namespace {
 using namespace Testing;
 using testing::AllOf;
 using testing::HasSubstr;
+using testing::StartsWith;
 
 using Labeled = std::pair<std::string, std::map<std::string, std::string>>;
 
@@ -119,8 +120,10 @@ TEST_P(HwmonMachineTest, MetricsAreTheGoldenOutput)
     const Ended ended = run({"metrics"});
     EXPECT_EQ(ended.code, 0);
     EXPECT_EQ(ended.err, "");
-    EXPECT_EQ(comparable(ended.out), contentOf(std::string(SENSOR_PROFILE_SOURCE_DIR) +
-                                               "/tests/data/tools/" + GetParam() + "-metrics.txt"));
+    const std::string golden = contentOf(std::string(SENSOR_PROFILE_SOURCE_DIR) +
+                                         "/tests/data/tools/" + GetParam() + "-metrics.txt");
+    EXPECT_EQ(comparable(ended.out), golden);
+    EXPECT_THAT(comparable(scrape(ServerProcess({}))), StartsWith(golden));
 }
 
 INSTANTIATE_TEST_SUITE_P(Machines, HwmonMachineTest, testing::Values("arm", "hotplug", "laptop"),

@@ -258,6 +258,35 @@ TEST_F(MetricsTest, ServerGivesThoseOfTheCommandAndItsOwn)
     EXPECT_EQ(ended.out + ended.err, "");
 }
 
+// The command reads them through the provider, and so does a server that is given one.
+TEST_F(MetricsTest, ServerReadsWhatTheProviderPublishes)
+{
+    nlohmann::json nodes;
+    for (const char* const type : {"temperature", "voltage", "tachometer"})
+        for (unsigned status = 0; status <= 27; ++status)
+            for (const double reading : {0.0, -12.3456, 3.3, 1e300}) {
+                const std::string number = std::to_string(nodes.size());
+                nodes.push_back({{"type", type}, {"path", "/" + number}, {"status", status},
+                    {"description", " Sensor\t" + number + ": "}, {"reading", reading},
+                    {"possibleStates", {1, 12, 16, 20, 21, 22, 23, 24, 25, 26, status}},
+                    {"baseUnits", std::array{2, 5, 19, 7, 0, 900}.at(nodes.size() % 6)},
+                    {"lowerNonCritical", reading / 2}, {"upperNonCritical", 1},
+                    {"lowerCritical", 0}, {"upperCritical", 2}, {"lowerFatal", -4.0005},
+                    {"upperFatal", 5e11}});
+            }
+    const std::string file =
+        folder_.write("all.json", nlohmann::json{{"nodes", std::move(nodes)}}.dump());
+    const std::string expected = comparable(run({"metrics", "--model", file}).out);
+    EXPECT_EQ(countOf(expected, "\nsensor_profile_health{"), 3U * 28 * 4);
+    for (const std::vector<std::string>& more :
+        {std::vector<std::string>{}, {"--provider", sensorLibrary}}) {
+        std::vector<std::string> options = {"--model", file};
+        options.insert(options.end(), more.begin(), more.end());
+        const ServerProcess server(options);
+        EXPECT_THAT(comparable(ask(HttpClient(server.port()), get()).body), StartsWith(expected));
+    }
+}
+
 TEST_F(MetricsTest, OpenEnumerationsHoldObjects)
 {
     const ServerProcess server(withModel());

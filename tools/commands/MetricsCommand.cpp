@@ -42,8 +42,8 @@ public:
     {
         source_.selectMachine();
         ChipDevices devices;
-        const Harvest harvest =
-            readHarvest(ProviderClient(source_.sensorProviderFile()).manager(), devices);
+        const ProviderClient provider(source_.sensorProviderFile());
+        const Harvest harvest = readHarvest(&provider.manager(), devices);
         Exposition exposition(ExpositionForm::text);
         SensorMetrics sensors(0); // there is no further exposition
         addHarvest(exposition, harvest, sensors);

@@ -5,6 +5,8 @@
 #include "host/broker/Refusal.h"
 #include "host/broker/Request.h"
 #include "host/manager/Manager.h"
+#include "model/SensorHarvest.h"
+#include "model/SensorIndex.h"
 #include "platform/instrumentation/OpenSource.h"
 #include "platform/instrumentation/hwmon/ChipList.h"
 #include "tools/cim/ProviderClient.h"
@@ -24,10 +26,7 @@ namespace {
 
 using Vorn::NodeLexicon::NodeType;
 
-// Otherwise the tool's list of chips would replace the provider's while that uses it.
-constexpr bool isLibsensorsPrivate = SENSOR_PROFILE_PRIVATE_LIBSENSORS;
-
-Sensors readSensors(const Host::Manager& manager)
+Sensors readInstances(const Host::Manager& manager)
 {
     Host::Request request(manager.broker());
     std::vector<const char*> properties = propertiesOfSensors();
@@ -45,6 +44,21 @@ Sensors readSensors(const Host::Manager& manager)
     }
 }
 
+Sensors readRecords()
+{
+    std::vector<Vorn::SensorProfileProvider::Sensor> records;
+    getSensorInstances(records);
+    const Vorn::SensorProfileProvider::SensorIndex index(records);
+    Sensors sensors;
+    sensors.reserve(index.size());
+    Vorn::SensorProfileProvider::Sensor copy; // keeps its memory from record to record
+    for (const auto* const record : index.inOrder()) {
+        copy = *record;
+        sensors.emplace_back(copy);
+    }
+    return sensors;
+}
+
 constexpr auto anyAge = Vorn::Hwmon::ChipList::Clock::duration::max();
 
 using Chips = std::shared_ptr<const Vorn::Hwmon::Catalogue>;
@@ -54,13 +68,13 @@ using Chips = std::shared_ptr<const Vorn::Hwmon::Catalogue>;
 Chips listChips(Vorn::Hwmon::ChipList::Clock::duration ageOfAttributes)
 {
     try {
-        if (isLibsensorsPrivate)
+        if (canReadRecords())
             return Vorn::Hwmon::ChipList::instance().present(ageOfAttributes);
         Vorn::Hwmon::Catalogue chips;
         chips.machine = Vorn::Hwmon::presentMachine();
         return std::make_shared<const Vorn::Hwmon::Catalogue>(std::move(chips));
     } catch (const std::exception&) {
-        return nullptr; // the provider has logged the reason
+        return nullptr; // the reason is logged
     }
 }
 
@@ -85,7 +99,7 @@ bool isUp(const Vorn::SourceEntry& entry, const Vorn::Hwmon::Catalogue* chips,
                     return false;
         return true;
     } catch (const std::exception&) {
-        return false; // the provider has logged the reason
+        return false; // the reason is logged
     }
 }
 
@@ -115,15 +129,20 @@ std::vector<std::string> Harvest::lostSources() const
     return names;
 }
 
-Harvest readHarvest(const Host::Manager& manager, ChipDevices& devices)
+bool canReadRecords()
+{
+    return SENSOR_PROFILE_PRIVATE_LIBSENSORS;
+}
+
+Harvest readHarvest(const Host::Manager* manager, ChipDevices& devices)
 {
     const auto begin = std::chrono::steady_clock::now();
-    Harvest harvest{readSensors(manager), {}};
+    Harvest harvest{manager == nullptr ? readRecords() : readInstances(*manager), {}};
     const Chips chips = readsHwmon() ? listChips(anyAge) : nullptr;
     if (chips)
         devices.nameIn(harvest.sensors, chips->machine);
-    // The sources are listed once more, since the provider returns no error where one cannot be
-    // read or breaks off.
+    // The sources are listed once more, since neither records nor instances have an error where one
+    // cannot be read or breaks off.
     harvest.sources = statesOfSources(harvest.sensors, chips.get());
     // An attribute that is gone may still be in this list of the chips.
     if (chips && !harvest.sources.at("hwmon"))

@@ -32,9 +32,14 @@ struct Harvest {
     std::vector<std::string> lostSources() const;
 };
 
-// Reads all sensors through the provider. Where a source fails, the harvest has those of the
-// others.
-Harvest readHarvest(const Host::Manager& manager, ChipDevices& devices);
+// Reads all sensors through the provider that the manager has loaded. Where the manager is null,
+// reads the records of which a provider makes instances, in a third of the time. Where a source
+// fails, the harvest has the sensors of the others.
+Harvest readHarvest(const Host::Manager* manager, ChipDevices& devices);
+
+// Returns whether records can be read beside a provider in this process. Otherwise both would use
+// the shared libsensors, which has one list of chips.
+bool canReadRecords();
 
 // Returns the state of each source, as a harvest with these sensors has it. The chips are those of
 // the source hwmon; null where they cannot be listed.

@@ -5,6 +5,7 @@
 #include "host/broker/Array.h"
 #include "host/broker/Instance.h"
 #include "host/broker/String.h"
+#include "model/Sensor.h"
 #include "platform/text/Escape.h"
 #include "platform/text/Utf8.h"
 #include "platform/utilities/ProviderUtilities.h"
@@ -12,6 +13,7 @@
 
 #include <algorithm>
 #include <cmath>
+#include <functional>
 #include <limits>
 #include <utility>
 #include <vector>
@@ -26,8 +28,8 @@ constexpr std::int64_t unrepresentable = std::numeric_limits<std::int32_t>::min(
 // Codes of OperationalStatus and EnabledState.
 constexpr unsigned noContact = 12;
 constexpr unsigned lostCommunication = 13;
-constexpr std::int64_t disabled = 3;
-constexpr std::int64_t offline = 6;
+constexpr unsigned disabled = 3;
+constexpr unsigned offline = 6;
 
 // Returns an integer of any width and sign; nothing for a null, for another type and for what an
 // int64 cannot hold.
@@ -72,6 +74,12 @@ private:
     decltype(std::declval<const Host::NamedValues&>().begin()) next_;
 };
 
+// Returns the code of an integer property; 0 for a null.
+unsigned codeOf(std::optional<std::int64_t> number)
+{
+    return static_cast<unsigned>(number.value_or(0));
+}
+
 std::vector<unsigned> codesIn(const Host::Value& value)
 {
     std::vector<unsigned> codes;
@@ -82,22 +90,21 @@ std::vector<unsigned> codesIn(const Host::Value& value)
     return codes;
 }
 
-// Returns the words of the possible states that can be a CurrentState.
-std::vector<std::string_view> possibleStatesIn(const Host::Value& value)
+// Returns the words of those labels of PossibleStates that can be a CurrentState. textOf() returns
+// the text of a label.
+template <typename Labels, typename TextOf>
+std::vector<std::string_view> wordsOf(const Labels& labels, TextOf textOf)
 {
     std::vector<std::string_view> words;
-    const Host::Array* const array = value.array();
-    if (array == nullptr)
-        return words;
-    words.reserve(array->elements().size());
-    for (const Host::Value& element : array->elements())
-        if (const auto word = wordOfState(element.text().value_or("")))
+    words.reserve(labels.size());
+    for (const auto& label : labels)
+        if (const auto word = wordOfState(textOf(label)))
             words.push_back(*word);
     return words;
 }
 
 // Returns the name for a code of SensorType.
-std::string_view kindOf(std::int64_t sensorType)
+std::string_view kindOf(unsigned sensorType)
 {
     switch (sensorType) {
     case 2:
@@ -143,23 +150,54 @@ Sensor::Sensor(const Host::Instance& from) : instance(&from)
     const std::string_view id = properties.text("DeviceID");
     identify(properties.text("ElementName"), id);
     const std::string_view currentState = properties.text("CurrentState");
-    possibleStates = possibleStatesIn(properties["PossibleStates"]);
-    unit = unitSymbol(static_cast<std::uint64_t>(properties.number("BaseUnits").value_or(0)));
-    kind = kindOf(properties.number("SensorType").value_or(0));
-    const auto enabledState = properties.number("EnabledState");
-    health = static_cast<unsigned>(properties.number("HealthState").value_or(0));
+    if (const Host::Array* const states = properties["PossibleStates"].array())
+        possibleStates = wordsOf(
+            states->elements(), [](const Host::Value& value) { return value.text().value_or(""); });
+    unit = unitSymbol(codeOf(properties.number("BaseUnits")));
+    kind = kindOf(codeOf(properties.number("SensorType")));
+    const unsigned enabledState = codeOf(properties.number("EnabledState"));
+    health = codeOf(properties.number("HealthState"));
     const std::vector<unsigned> statuses = codesIn(properties["OperationalStatus"]);
     state = stateOf(currentState, statuses);
-    const auto has = [&](unsigned status) {
-        return std::find(statuses.begin(), statuses.end(), status) != statuses.end();
-    };
     const auto current = properties.number("CurrentReading");
     const auto modifier = static_cast<std::int32_t>(properties.number("UnitModifier").value_or(0));
-    const bool isSilent = has(noContact) || enabledState == disabled || enabledState == offline;
-    if (!has(lostCommunication) && !(current == 0 && isSilent))
-        reading = quantityOf(current, modifier);
+    setReading(quantityOf(current, modifier), enabledState, statuses);
     for (const std::size_t i : {0U, 3U, 1U, 4U, 2U, 5U}) // in the provider's order
         limits.at(i) = quantityOf(properties.number(limitKinds.at(i).property), modifier);
+}
+
+Sensor::Sensor(Vorn::SensorProfileProvider::Sensor& record)
+{
+    identify(record.getElementName(), record.deviceID());
+    possibleStates = wordsOf(record.getPossibleStates(), std::identity());
+    unit = unitSymbol(record.getBaseUnits());
+    kind = kindOf(record.getSensorType());
+    health = record.getHealthState();
+    const auto codes = record.getOperationalStatus();
+    const std::vector<unsigned> statuses(codes.begin(), codes.end());
+    state = stateOf(record.getCurrentState(), statuses);
+    const std::int32_t modifier = record.getUnitModifier();
+    setReading(
+        quantityOf(record.getCurrentReading(), modifier), record.getEnabledState(), statuses);
+    const std::array<std::int32_t, limitKinds.size()> thresholds = {
+        record.getLowerThresholdNonCritical(), record.getLowerThresholdCritical(),
+        record.getLowerThresholdFatal(), record.getUpperThresholdNonCritical(),
+        record.getUpperThresholdCritical(), record.getUpperThresholdFatal()};
+    for (std::size_t i = 0; i < thresholds.size(); ++i)
+        if (thresholds.at(i) != 0) // the instance has no property for 0
+            limits.at(i) = quantityOf(thresholds.at(i), modifier);
+}
+
+void Sensor::setReading(std::optional<Quantity> currentReading, unsigned enabledState,
+    std::span<const unsigned> operationalStatus)
+{
+    const auto has = [&](unsigned status) {
+        return std::ranges::find(operationalStatus, status) != operationalStatus.end();
+    };
+    const bool isSilent = has(noContact) || enabledState == disabled || enabledState == offline;
+    const bool isZero = currentReading && currentReading->value == 0;
+    if (!has(lostCommunication) && !(isZero && isSilent))
+        reading = currentReading;
 }
 
 std::string deviceIdOf(const std::string& description, std::string_view path)

@@ -10,12 +10,17 @@
 #include <cstddef>
 #include <cstdint>
 #include <optional>
+#include <span>
 #include <string>
 #include <string_view>
 #include <vector>
 
 namespace Host {
 class Instance;
+}
+
+namespace Vorn::SensorProfileProvider {
+class Sensor;
 }
 
 namespace Tools {
@@ -59,6 +64,9 @@ struct Sensor {
     Sensor() = default;
     // Interprets an instance of ZUMLO_NumericSensor.
     explicit Sensor(const Host::Instance& from);
+    // Interprets a record of the provider, as if it were the instance made of it. The record counts
+    // how often it is read.
+    explicit Sensor(Vorn::SensorProfileProvider::Sensor& record);
 
     // Sets the names that the provider gives a node.
     void setNames(const std::string& description, std::string_view itsPath);
@@ -85,6 +93,8 @@ struct Sensor {
 
 private:
     void identify(std::string_view elementName, std::string_view id);
+    void setReading(std::optional<Quantity> currentReading, unsigned enabledState,
+        std::span<const unsigned> operationalStatus);
 };
 
 inline constexpr std::array<const char*, 3> sensorKinds = {"temperature", "voltage", "fan"};

@@ -157,8 +157,10 @@ public:
         MemoryReturn memoryReturn(objects);
         RequestCounts operations(memoryReturn);
         ChipDevices devices;
-        SingleFlight<Harvest> harvests([&objects, &devices] {
-            return std::make_shared<const Harvest>(readHarvest(objects.manager(), devices));
+        const bool isProviderAsked = source_.provider() || !canReadRecords();
+        const Host::Manager* const asked = isProviderAsked ? &objects.manager() : nullptr;
+        SingleFlight<Harvest> harvests([asked, &devices] {
+            return std::make_shared<const Harvest>(readHarvest(asked, devices));
         });
         Host::Http::ResponseCounts responses;
         MetricsResource metrics(harvests, [&](Exposition& exposition) {

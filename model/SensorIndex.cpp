@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-#include "factory/SensorIndex.h"
+#include "model/SensorIndex.h"
 
 #include <algorithm>
 #include <bit>
