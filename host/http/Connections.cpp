@@ -28,9 +28,9 @@ bool hasClientFinished(int descriptor)
     return ::recv(descriptor, &next, 1, MSG_PEEK | MSG_DONTWAIT) == 0;
 }
 
-// New connections are closed after all others that are idle, since their clients may be sending the
-// first request or may be in a TLS handshake.
-constexpr std::chrono::seconds timeToBegin{2};
+// For this time, new connections are closed after all others, since their clients may be sending
+// the first request or may be in a TLS handshake. A request arrives whole in it, as a rule.
+constexpr std::chrono::seconds timeToSend{2};
 
 // Returns whether the client has sent what the thread of the connection has yet to read.
 bool hasUnreadBytes(int descriptor)
@@ -96,13 +96,18 @@ bool Connections::makeRoomAmong(const Counts& counts, std::size_t maximum)
             counted.push_back(&each);
     if (counted.size() < maximum)
         return true;
-    std::erase_if(counted, [](const ClientConnection* each) {
-        return each->phase != Phase::idle || hasUnreadBytes(each->descriptor);
+    const auto hadTime = [&, now = Clock::now()](const ClientConnection* each) {
+        const auto begin = each->deadline - timeoutOf(each->phase);
+        return begin + timeToSend < now;
+    };
+    std::erase_if(counted, [&](const ClientConnection* each) {
+        return each->phase == Phase::receiving
+                   ? !hadTime(each)
+                   : each->phase != Phase::idle || hasUnreadBytes(each->descriptor);
     });
-    const auto newSince = Clock::now() + timeoutOf(Phase::idle) - timeToBegin;
-    const auto rank = [newSince](const ClientConnection* each) {
-        const bool isNew = each->use == Use::nothing && each->deadline > newSince;
-        return std::tuple(isNew, each->use, each->deadline);
+    const auto rank = [&](const ClientConnection* each) {
+        const bool isNew = each->use == Use::nothing && !hadTime(each);
+        return std::tuple(isNew, each->phase == Phase::receiving, each->use, each->deadline);
     };
     const auto found = std::ranges::min_element(counted, {}, rank);
     if (found == counted.end())

@@ -114,10 +114,10 @@ private:
     // Returns what is to be logged.
     std::vector<std::string> closeOverdue();
     std::chrono::seconds timeoutOf(Phase phase) const;
-    // Returns whether there is room for one more connection of those that count, for which an idle
-    // one of them is closed where need be (RFC 9112, 9.5): of those with the least use, the one
-    // that has been idle the longest, and new ones last. None is closed that has sent a request
-    // line or bytes that were not read yet.
+    // Returns whether there is room for one more connection of those that count, for which one of
+    // them is closed where need be (RFC 9112, 9.5): of the idle ones with the least use the one
+    // that has been idle the longest; then one whose request arrives too slowly; new ones last.
+    // None is closed that has just begun a request or has sent bytes that were not read yet.
     template <typename Counts>
     bool makeRoomAmong(const Counts& counts, std::size_t maximum);
     bool exceedsLimitsOfStreams(const ClientConnection& connection) const;

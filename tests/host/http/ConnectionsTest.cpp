@@ -102,6 +102,26 @@ TEST(ConnectionsTest, NewOneStaysWhereAnotherIsIdle)
     EXPECT_TRUE(added->isLeaving);
 }
 
+TEST(ConnectionsTest, RequestThatArrivesTooSlowlyMakesRoomBeforeNewOnes)
+{
+    Host::Http::Limits limits;
+    limits.maximumConnections = 3;
+    Connections connections(limits);
+    ClientConnection* const slow = connections.add(-1, someAddress, nullptr);
+    connections.enter(*slow, Phase::receiving);
+    slow->deadline -= std::chrono::seconds(3);
+    ClientConnection* const operated = connections.add(-1, someAddress, nullptr);
+    connections.enter(*operated, Phase::answering);
+    connections.enter(*operated, Phase::idle);
+    const auto* const added = connections.add(-1, someAddress, nullptr);
+    for (const auto* const each : {operated, slow}) {
+        EXPECT_FALSE(each->isLeaving);
+        connections.enter(*connections.add(-1, someAddress, nullptr), Phase::receiving);
+        EXPECT_TRUE(each->isLeaving);
+    }
+    EXPECT_FALSE(added->isLeaving);
+}
+
 TEST(ConnectionsTest, RequestThatHasYetToBeReadKeepsItsConnection)
 {
     std::array<int, 2> sockets{};
