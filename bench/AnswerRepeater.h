@@ -2,7 +2,7 @@
 
 #pragma once
 
-#include "platform/instrumentation/Descriptor.h"
+#include "platform/utilities/Descriptor.h"
 
 #include <cstddef>
 #include <cstdint>

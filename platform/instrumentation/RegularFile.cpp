@@ -2,7 +2,7 @@
 
 #include "platform/instrumentation/RegularFile.h"
 
-#include "platform/instrumentation/Descriptor.h"
+#include "platform/utilities/Descriptor.h"
 
 #include <algorithm>
 #include <array>

@@ -2,7 +2,7 @@
 
 #pragma once
 
-#include "platform/instrumentation/Descriptor.h"
+#include "platform/utilities/Descriptor.h"
 #include "tools/collect/Transport.h"
 
 namespace Ipmi {

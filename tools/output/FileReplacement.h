@@ -4,7 +4,7 @@
 
 #pragma once
 
-#include "platform/instrumentation/Descriptor.h"
+#include "platform/utilities/Descriptor.h"
 
 #include <sys/types.h>
 

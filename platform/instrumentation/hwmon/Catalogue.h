@@ -5,10 +5,10 @@
 
 #pragma once
 
-#include "platform/instrumentation/Descriptor.h"
 #include "platform/instrumentation/Source.h"
 #include "platform/instrumentation/hwmon/AttributeMeaning.h"
 #include "platform/instrumentation/hwmon/Machine.h"
+#include "platform/utilities/Descriptor.h"
 
 #include <cstddef>
 #include <optional>

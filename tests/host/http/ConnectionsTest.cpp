@@ -5,7 +5,7 @@
 #include "host/http/Connections.h"
 #include "host/http/UnsentObjects.h"
 #include "host/http/WorkSlots.h"
-#include "platform/instrumentation/Descriptor.h"
+#include "platform/utilities/Descriptor.h"
 
 #include <gtest/gtest.h>
 

@@ -2,8 +2,8 @@
 
 // The descriptors of the chips' folders.
 
-#include "platform/instrumentation/Descriptor.h"
 #include "platform/instrumentation/hwmon/HwmonSource.h"
+#include "platform/utilities/Descriptor.h"
 #include "tests/platform/instrumentation/HwmonMachine.h"
 
 #include <fcntl.h>

@@ -2,8 +2,8 @@
 
 // Slow chips, which `hwmon:parallel` reads at the same time.
 
-#include "platform/instrumentation/Descriptor.h"
 #include "platform/instrumentation/hwmon/HwmonSource.h"
+#include "platform/utilities/Descriptor.h"
 #include "tests/platform/instrumentation/HwmonMachine.h"
 
 #include <fcntl.h>
