@@ -274,15 +274,14 @@ TEST_F(MetricsTest, ServerReadsWhatTheProviderPublishes)
                     {"lowerCritical", 0}, {"upperCritical", 2}, {"lowerFatal", -4.0005},
                     {"upperFatal", 5e11}});
             }
-    const std::string file =
-        folder_.write("all.json", nlohmann::json{{"nodes", std::move(nodes)}}.dump());
-    const std::string expected = comparable(run({"metrics", "--model", file}).out);
+    const std::string source =
+        "model:" + folder_.write("all.json", nlohmann::json{{"nodes", std::move(nodes)}}.dump());
+    const std::string twice = source + "," + source; // of two with one DeviceID, one is published
+    const std::string expected = comparable(metricsOfSources(twice));
     EXPECT_EQ(countOf(expected, "\nsensor_profile_health{"), 3U * 28 * 4);
-    for (const std::vector<std::string>& more :
+    for (const std::vector<std::string>& options :
         {std::vector<std::string>{}, {"--provider", sensorLibrary}}) {
-        std::vector<std::string> options = {"--model", file};
-        options.insert(options.end(), more.begin(), more.end());
-        const ServerProcess server(options);
+        const ServerProcess server(options, {{"VORN_INSTRUMENTATION", twice}});
         EXPECT_THAT(comparable(ask(HttpClient(server.port()), get()).body), StartsWith(expected));
     }
 }
