@@ -25,7 +25,7 @@ namespace {
 constexpr std::size_t columnOfDescriptions = 22; // in the help
 
 constexpr const char* footer = "Exit codes: 0 success, 1 failure, 2 wrong usage, 3 nothing found.\n"
-                               "`sensorctl COMMAND --help` tells more about a command.";
+                               "`sensorctl COMMAND --help` describes a command.";
 
 // CMPI_VERSION is a hundred times the version.
 std::string versionText()

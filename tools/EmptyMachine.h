@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// Whether a machine has no sensors, and what a user is told then.
+// Whether a machine has no sensors, and the message for the user then.
 
 #pragma once
 

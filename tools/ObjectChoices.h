@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// What a user is told where no object, or more than one, is found.
+// The messages for the user where no object, or more than one, is found.
 
 #pragma once
 

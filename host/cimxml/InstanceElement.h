@@ -29,8 +29,8 @@ class InstanceMarkup {
 public:
     explicit InstanceMarkup(ObjectSelection selection = {}) : selection_(std::move(selection)) {}
 
-    // The class is null where it is not known; else it must outlive the object. All
-    // instances must live until the last one is written.
+    // The class is null where it is not known; else it must outlive the object. All instances must
+    // live until the last one is written.
     void write(std::string& out, const Instance& instance, const ClassDeclaration* declared);
 
 private:

@@ -24,8 +24,8 @@ class Message;
 std::string errorResponse(const Message& message, CMPIrc code, std::string_view description);
 
 // Appends the response of a successful operation: the beginning, each object in the element in
-// which the operation returns it, and the end. Instances must live until
-// the last one is appended. Used by one thread at a time.
+// which the operation returns it, and the end. Instances must live until the last one is appended.
+// Used by one thread at a time.
 class ResponseWriter {
 public:
     // The repository must outlive the writer. The selection is the operation's own; for one that

@@ -28,7 +28,7 @@ enum class Phase {
     idle,      // between requests
     receiving, // a request arrives
     working,   // the server works on it: no timeout counts
-    waiting,   // its sign-in (see waitUntil) or its stream waits: ends where the client closes the
+    waiting,   // its sign-in (see waitUntil) or its stream waits; ends when the client closes the
                // connection
     answering, // the client fetches the answer
     fetching,  // the client fetches a resource or a piece of a stream
@@ -98,7 +98,7 @@ public:
     // the others after their answer, or soon when their request does not arrive. Idempotent.
     void beginShutdown();
     bool isShuttingDown() const;
-    // Blocks until then, but no longer than until the shutdown begins or the client closes the
+    // Blocks until the time, but no longer than until the shutdown begins or the client closes the
     // connection. Returns whether the time was reached. REQUIRES: the phase is `working`.
     bool waitUntil(ClientConnection& connection, Clock::time_point time);
     // Blocks until no request is in progress, at most for the timeout. Returns whether that was
@@ -126,10 +126,11 @@ private:
 
     const Limits& limits_;
     mutable std::mutex mutex_;
-    // A first connection, the end of a wait, the beginning of the shutdown.
+    // Notified when the first connection is added, when a wait is interrupted and when the shutdown
+    // begins.
     std::condition_variable_any changed_;
-    // The end of the last request in progress. It is apart since the watcher waits for the others,
-    // and would run after each request of a client.
+    // Notified when the last request in progress ends. It is a condition of its own, since the
+    // watcher, which waits for changed_, would run after each request of a client.
     std::condition_variable becameIdle_;
     std::list<ClientConnection> all_;
     std::size_t busy_ = 0; // connections that are not idle

@@ -37,8 +37,8 @@ constexpr std::size_t memoryBesideHead = std::size_t{48} << 10;
 // Providers run on the threads of the connections.
 constexpr std::size_t stackSize = std::size_t{512} << 10;
 
-// Of a query, which no request needs. libmicrohttpd keeps the arguments in the memory for the head,
-// and neither answers nor closes the connection when that is used up.
+// The greatest number of arguments in a query. libmicrohttpd keeps the arguments in the memory for
+// the head, and neither answers nor closes the connection when that is used up.
 constexpr std::ptrdiff_t maximumArguments = 100;
 
 // The closure of each callback is the Service. No exception leaves a callback.
@@ -220,7 +220,7 @@ Daemon::Daemon(Service& service, ListeningSocket socket)
 Daemon::~Daemon()
 {
     stopAccepting();
-    service_.connections.beginShutdown(); // or a thread would sleep until its sign-in is refused
+    service_.connections.beginShutdown(); // no thread waits until its sign-in is refused
 }
 
 void Daemon::logLine(void* daemon, const char* format, std::va_list arguments) noexcept
@@ -246,7 +246,7 @@ void Daemon::start(const Certificate* certificate)
     const auto number = [](std::size_t value) { return static_cast<std::intptr_t>(value); };
     const Limits& limits = service_.limits;
     std::vector<MHD_OptionItem> options{
-        // First, since the library logs from then on.
+        // This option comes first, so that what the library reports of the others is logged.
         {MHD_OPTION_EXTERNAL_LOGGER, reinterpret_cast<std::intptr_t>(&logLine), this},
         {MHD_OPTION_LISTEN_SOCKET, socket_.descriptor(), nullptr},
         {MHD_OPTION_CONNECTION_MEMORY_LIMIT, number(limits.maximumHeader + memoryBesideHead),
@@ -273,7 +273,7 @@ void Daemon::start(const Certificate* certificate)
         &service_, MHD_OPTION_ARRAY, options.data(), MHD_OPTION_END));
     if (!daemon_)
         throw std::runtime_error("cannot serve " + socket_.address().text() +
-                                 ": the HTTP library did not start, the log may tell why");
+                                 ": the HTTP library did not start, the log may have the reason");
     isStarted_ = true;
 }
 

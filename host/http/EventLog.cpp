@@ -15,14 +15,14 @@ namespace {
 
 constexpr int levelOfDetails = 4000;
 
-struct Range {
+struct CodeRange {
     char32_t first;
     char32_t last;
 };
 
 // Characters that are invisible or change how others are displayed. The log itself escapes the
 // control characters of ASCII.
-constexpr std::array<Range, 9> unseen{{
+constexpr std::array<CodeRange, 9> unseen{{
     {0x80, 0x9F},       // control characters
     {0xAD, 0xAD},       // the hyphen that is shown at the end of a line
     {0x61C, 0x61C},     // a mark of direction
@@ -37,7 +37,7 @@ constexpr std::array<Range, 9> unseen{{
 bool isUnseen(char32_t code)
 {
     return std::any_of(unseen.begin(), unseen.end(),
-        [code](const Range& range) { return code >= range.first && code <= range.last; });
+        [code](const CodeRange& range) { return code >= range.first && code <= range.last; });
 }
 
 void appendNumber(std::string& line, const char* format, unsigned number)

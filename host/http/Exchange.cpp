@@ -5,8 +5,8 @@
 #include "host/cimxml/Message.h"
 #include "host/cimxml/RequestError.h"
 #include "host/http/EventLog.h"
+#include "host/http/MhdResponse.h"
 #include "host/http/ResourceCheck.h"
-#include "host/http/Response.h"
 #include "host/http/Service.h"
 
 #include <microhttpd.h>
@@ -112,7 +112,7 @@ void Exchange::signIn(const RequestHead& head)
     enter(Phase::receiving);
 }
 
-// Returns false for a wrong password, and not before the client may know.
+// Returns whether the password is right. For a wrong one, blocks until it may be answered.
 bool Exchange::isPasswordRight(const Credentials& credentials)
 {
     SignIns& signIns = service_.signIns;
@@ -201,7 +201,8 @@ bool Exchange::execute()
     } catch (const std::exception& error) {
         report({"execute", "Exchange", __LINE__}, std::string("a request failed: ") + error.what(),
             Severity::error);
-        error_ = HttpError(MHD_HTTP_INTERNAL_SERVER_ERROR, "the request failed; the log tells why");
+        error_ =
+            HttpError(MHD_HTTP_INTERNAL_SERVER_ERROR, "the request failed; the log has the reason");
     }
     answer_.drop();
     return sendError();
@@ -232,8 +233,8 @@ void Exchange::readResource()
 void Exchange::enter(Phase phase)
 {
     service_.connections.enter(client_, phase);
-    // To libmicrohttpd the client is silent while its request is worked on. The time counts anew
-    // when a timeout follows none.
+    // libmicrohttpd takes the processing of a request for silence of the client, so that it has no
+    // timeout meanwhile. Setting one where there was none restarts it.
     const auto timeout = phase == Phase::working || phase == Phase::waiting
                              ? std::chrono::seconds(0)
                              : service_.limits.idleTimeout;
@@ -244,8 +245,8 @@ void Exchange::enter(Phase phase)
 bool Exchange::sendAnswer()
 {
     // The library reads the text or the answer until the request ends, and this exchange with it.
-    Response response =
-        answer_.isWhole() ? Response::whole(answer_.text()) : Response::inPieces(answer_);
+    MhdResponse response =
+        answer_.isWhole() ? MhdResponse::whole(answer_.text()) : MhdResponse::inPieces(answer_);
     for (const HeaderField& field : answerFieldsFor(head_))
         response.add(field);
     if (service_.connections.isShuttingDown())
@@ -255,8 +256,8 @@ bool Exchange::sendAnswer()
 
 bool Exchange::sendRepresentation()
 {
-    Response response =
-        stream_ ? Response::inPieces(*stream_) : Response::whole(*representation_.content);
+    MhdResponse response =
+        stream_ ? MhdResponse::inPieces(*stream_) : MhdResponse::whole(*representation_.content);
     for (const HeaderField& field : representation_.fields)
         response.add(field);
     if (service_.connections.isShuttingDown())
@@ -267,7 +268,7 @@ bool Exchange::sendRepresentation()
 bool Exchange::sendError()
 {
     errorText_ = std::string(error_->what()) + "\n";
-    Response response = Response::whole(errorText_);
+    MhdResponse response = MhdResponse::whole(errorText_);
     response.add({"Content-Type", "text/plain; charset=utf-8"});
     if (!error_->cimError().empty())
         response.add({"CIMError", error_->cimError()});
@@ -278,7 +279,7 @@ bool Exchange::sendError()
     return send(response, error_->status(), Phase::answering);
 }
 
-bool Exchange::send(Response& response, unsigned status, Phase phase)
+bool Exchange::send(MhdResponse& response, unsigned status, Phase phase)
 {
     if (service_.responses != nullptr)
         service_.responses->add(status);

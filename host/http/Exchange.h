@@ -19,7 +19,7 @@ struct MHD_Connection;
 
 namespace Host::Http {
 
-class Response;
+class MhdResponse;
 enum class Phase;
 struct ClientConnection;
 struct Service;
@@ -61,7 +61,7 @@ private:
     bool sendAnswer();
     bool sendRepresentation();
     bool sendError();
-    bool send(Response& response, unsigned status, Phase phase);
+    bool send(MhdResponse& response, unsigned status, Phase phase);
     std::string summary(unsigned status) const;
 
     Service& service_;

@@ -4,6 +4,7 @@
 
 #include "host/broker/Names.h"
 #include "host/cimxml/Message.h"
+#include "platform/text/Trim.h"
 
 #include <microhttpd.h>
 
@@ -154,12 +155,7 @@ std::string_view nameSpaceIn(std::string_view object)
         const std::size_t end = object.find('/', 2);
         object.remove_prefix(end == std::string_view::npos ? object.size() : end);
     }
-    object = object.substr(0, object.find(':'));
-    while (object.starts_with('/'))
-        object.remove_prefix(1);
-    while (object.ends_with('/'))
-        object.remove_suffix(1);
-    return object;
+    return Text::trimmed(object.substr(0, object.find(':')), "/");
 }
 
 } // namespace

@@ -17,12 +17,12 @@ struct Limits {
     std::size_t maximumConnections = 256;
     std::size_t maximumConnectionsPerAddress = 64; // an IPv6 network of 64 bits is one address
 
-    // Operations and password checks that run at a time, and those that wait for that.
+    // The number of operations and password checks that run at a time, and of those that wait.
     std::size_t workers = 4;
     std::size_t maximumQueue = 128;
 
-    // In the answers that clients have yet to fetch, except in one that is alone. A sensor takes
-    // four kilobytes. The objects of operations that still run are not included.
+    // The number of objects in all answers that clients have yet to fetch; a single answer may have
+    // more. A sensor takes four kilobytes. Objects of operations that still run do not count.
     std::size_t maximumUnsentObjects = 200'000;
 
     // How long a connection may transfer nothing in either direction, how long a request may take

@@ -21,7 +21,7 @@ struct ListenWishes {
 struct Endpoint {
     Address address;
     bool isEncrypted = false;
-    // A default that is left out where the machine does not have the address.
+    // Whether it is a default, which is left out where the machine does not have the address.
     bool isOptional = false;
 };
 

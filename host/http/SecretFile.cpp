@@ -2,6 +2,8 @@
 
 #include "host/http/SecretFile.h"
 
+#include "platform/utilities/Descriptor.h"
+
 #include <fcntl.h>
 #include <sys/stat.h>
 #include <unistd.h>
@@ -27,11 +29,6 @@ constexpr std::size_t maximumSize = std::size_t{1} << 20;
 {
     failAt(file, std::system_category().message(errno));
 }
-
-struct Descriptor {
-    ~Descriptor() { ::close(number); }
-    const int number;
-};
 
 std::string readAll(int descriptor, const std::string& file)
 {
@@ -64,15 +61,15 @@ void requireSecrecy(const struct stat& status, const std::string& file)
 std::string readFile(const std::string& file, bool isSecret)
 {
     // Without O_NONBLOCK, opening a FIFO would wait for its writer.
-    const Descriptor descriptor{::open(file.c_str(), O_RDONLY | O_CLOEXEC | O_NONBLOCK)};
+    const Vorn::Descriptor descriptor(::open(file.c_str(), O_RDONLY | O_CLOEXEC | O_NONBLOCK));
     struct stat status = {};
-    if (descriptor.number < 0 || ::fstat(descriptor.number, &status) != 0)
+    if (!descriptor.isOpen() || ::fstat(descriptor.number(), &status) != 0)
         failByErrno(file);
     if (!S_ISREG(status.st_mode))
         failAt(file, "it is no regular file");
     if (isSecret)
         requireSecrecy(status, file);
-    return readAll(descriptor.number, file);
+    return readAll(descriptor.number(), file);
 }
 
 } // namespace

@@ -67,8 +67,6 @@ public:
     // Counts a failure. Returns when it may be answered.
     Time fail(const std::string& address, Time now);
 
-    std::size_t size() const { return failures_.size(); }
-
 private:
     struct Failures {
         unsigned count = 0;

@@ -21,7 +21,7 @@ bool matches(const std::string& name, const std::string& wanted)
     return wanted.empty() || equalNames(name, wanted);
 }
 
-// Null for any class.
+// Returns whether a class is the wanted one or derived from it. A null means any class.
 bool isA(const ClassDeclaration& declared, const ClassDeclaration* wanted)
 {
     return wanted == nullptr || &declared == wanted || declared.isDerivedFrom(*wanted);

@@ -48,7 +48,7 @@ std::string OpenEnumerations::open(OpenEnumeration enumeration)
 {
     std::string context = makeContext();
     const std::size_t held = enumeration.waiting.heldObjects();
-    Removed removed; // goes after the lock: there may be much to give back
+    Removed removed; // destroyed without the lock, since much may be freed
     const std::lock_guard lock(mutex_);
     removeExpired(removed);
     if (table_.size() >= limits_.maximumOpenEnumerations)
@@ -116,7 +116,7 @@ void OpenEnumerations::removeExpired(Removed& removed)
 void OpenEnumerations::remove(Table::iterator entry, Removed& removed)
 {
     const std::size_t held = entry->second.enumeration.waiting.heldObjects();
-    removed.emplace_back(); // first, for lack of memory must not take place in between
+    removed.emplace_back(); // first: what allocates must not throw after the extraction
     removed.back() = table_.extract(entry);
     heldObjects_ -= held;
 }

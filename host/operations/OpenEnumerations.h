@@ -18,8 +18,8 @@
 
 namespace Host {
 
-// The client that opened an enumeration, and what it pulls. For others the
-// enumeration does not exist.
+// The client that opened an enumeration, and what it pulls. For others the enumeration does not
+// exist.
 struct EnumerationOwner {
     std::string principal;
     std::string nameSpace;
@@ -60,10 +60,10 @@ public:
     // Returns at most that many of the remaining objects and restarts the timeout. Throws Refusal
     // (invalidEnumerationContext) when the owner has no such enumeration.
     Pulled pull(const std::string& context, const EnumerationOwner& owner, std::size_t count);
-    // Throws the same; what the owner pulls does not matter.
+    // Closes the enumeration, whatever the owner pulls. Throws as pull() does.
     void close(const std::string& context, const EnumerationOwner& owner);
 
-    // To be called with operations that use none of the enumerations.
+    // Frees enumerations that have timed out. Operations that use none call it.
     void removeExpired();
 
     // Returns the number of objects in memory.

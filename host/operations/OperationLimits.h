@@ -11,11 +11,11 @@ namespace Host {
 // Limits of open enumerations. The first two bound the memory that is held between requests: a
 // sensor takes four kilobytes.
 struct OperationLimits {
-    // Of all clients.
+    // The number of enumerations that all clients have open.
     std::size_t maximumOpenEnumerations = 64;
-    // In the memory of all open enumerations, with the objects that were pulled already.
+    // The number of objects in the memory of all of them, with those that were pulled already.
     std::size_t maximumHeldObjects = 100'000;
-    // Of one response; MaxObjectCount above it is cut to it.
+    // The number of objects in one response, to which a greater MaxObjectCount is reduced.
     std::uint32_t maximumObjectCount = 10'000;
     // OperationTimeout where the client gives none, and the longest it may give.
     std::chrono::seconds defaultTimeout{60};

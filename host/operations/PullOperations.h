@@ -30,12 +30,12 @@ public:
     Continuation open(
         const CimXml::Operation& operation, const std::string& principal, FoundObjects& found);
 
-    // The operation's selection becomes that of the enumeration.
+    // Returns the next objects. The operation's selection becomes that of the enumeration.
     Continuation pull(
         CimXml::Operation& operation, const std::string& principal, FoundObjects& found);
     void close(const CimXml::Operation& operation, const std::string& principal);
 
-    // Frees the memory of enumerations that have timed out. To be called with each operation.
+    // Frees the memory of enumerations that have timed out. Each operation calls it.
     void removeExpired() { enumerations_.removeExpired(); }
 
     // Returns the number of objects in the memory of open enumerations.

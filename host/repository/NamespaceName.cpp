@@ -2,6 +2,8 @@
 
 #include "host/repository/NamespaceName.h"
 
+#include "platform/text/Trim.h"
+
 namespace Host {
 
 namespace {
@@ -16,10 +18,7 @@ constexpr bool isNameCharacter(char c)
 
 std::string plainNamespaceName(std::string_view name)
 {
-    while (!name.empty() && name.front() == '/')
-        name.remove_prefix(1);
-    while (!name.empty() && name.back() == '/')
-        name.remove_suffix(1);
+    name = Text::trimmed(name, "/");
     char before = '/';
     for (const char c : name) {
         if (c == '/' ? before == '/' : !isNameCharacter(c))

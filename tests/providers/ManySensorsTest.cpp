@@ -123,6 +123,20 @@ TEST_F(ElementCapabilitiesOf65537SensorsTest, ThereIsOnePairAndOneFarEnd)
     EXPECT_EQ(answer_.instances().size(), 1U);
 }
 
+TEST_F(ElementCapabilitiesOf65537SensorsTest, AnInstanceBeyondTheCountIsNotFound)
+{
+    const auto getPair = [&](const std::string& deviceID) {
+        Host::ObjectPath& ref = path(elementCapabilities);
+        ref.addKey("Capabilities", Host::Value::of(capabilities()));
+        ref.addKey("ManagedElement", Host::Value::of(sensor(deviceID)));
+        expectOk(get(ref));
+    };
+    getPair("F:/100000");
+    EXPECT_EQ(answer_.instances().size(), 1U);
+    getPair("F:/100001");
+    EXPECT_EQ(answer_.instances().size(), 1U);
+}
+
 TEST_F(SystemDeviceOf65537SensorsTest, ThereIsOnePairForEachSystem)
 {
     expectOk(associatorNames(system("host")));

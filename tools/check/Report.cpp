@@ -82,7 +82,7 @@ std::string performanceName(std::string name)
     return "'" + printable(name) + "'";
 }
 
-// By importance: unknown is less than warning.
+// Returns a greater number for a more important status; unknown is less than warning.
 int rankOf(CheckStatus status)
 {
     constexpr std::array ranks = {0, 2, 3, 1};

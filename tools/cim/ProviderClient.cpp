@@ -27,11 +27,9 @@ ProviderClient::ProviderClient(const ProviderFiles& files)
     : classes_(compileClasses()),
       manager_(*classes_, Host::sensorProfileProviders(files.sensors, files.computerSystem))
 {
-    for (const auto& provider : Host::sensorProfileProviders({}, std::string())) {
-        served_.push_back(provider.className);
+    for (const auto& provider : Host::sensorProfileProviders({}, std::string()))
         if (provider.servesAssociations)
             associations_.push_back(provider.className);
-    }
     beginRequest();
 }
 

@@ -38,8 +38,7 @@ public:
 
     // Returns the class's name as it is declared in any namespace; nothing for an unknown class.
     std::optional<std::string> declaredClass(std::string_view className) const;
-    // Return the names of the served classes, and of the associations among them.
-    const std::vector<std::string>& servedClasses() const { return served_; }
+    // Returns the names of the association classes that are served.
     const std::vector<std::string>& associationClasses() const { return associations_; }
 
     // Returns the instances of the class and its subclasses in the provider's order, with those
@@ -63,7 +62,6 @@ public:
 
 private:
     std::unique_ptr<const Host::Repository> classes_;
-    std::vector<std::string> served_;
     std::vector<std::string> associations_;
     Host::Manager manager_;
     std::optional<Host::Request> request_;

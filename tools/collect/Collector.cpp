@@ -170,8 +170,8 @@ void Collector::readSensor(Bmc& bmc, std::size_t index)
         readBefore_.insert(address);
     sensor.isAbsent = answer.kind == Kind::unavailable && !readBefore_.contains(address);
     values.reading = hasReading ? valueOf(bmc, sensor, answer.raw) : std::nullopt;
-    // The time between the pulses of a fan that stands has no reciprocal. Only the alarm tells it
-    // from a time that was not measured.
+    // The time between the pulses of a fan that stands has no reciprocal. Only the alarm
+    // distinguishes it from a time that was not measured.
     const bool isSlowFan = hasReading && hasThresholds && isLow(answer.crossed.value_or(0)) &&
                            sensor.kind.type == Vorn::NodeLexicon::NodeType::Tachometer;
     if (!values.reading && isSlowFan && sensor.record.linearization == reciprocal)

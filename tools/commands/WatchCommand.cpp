@@ -122,14 +122,14 @@ private:
         return sensors;
     }
 
-    struct Renewal {
+    struct HistoryRenewal {
         std::vector<Change> changes;
         std::string failure; // empty when the sensors could be read
     };
 
     // Updates the history. While a source fails, the sensors that are absent may be its own, and
     // stay as they were. There is no provider then, and the next call loads it again.
-    Renewal renew(std::optional<ProviderClient>& provider, History& history) const
+    HistoryRenewal renew(std::optional<ProviderClient>& provider, History& history) const
     {
         try {
             const std::time_t now = std::time(nullptr);
@@ -156,7 +156,7 @@ private:
         History history;
         std::string failure;
         for (;; std::this_thread::sleep_for(std::chrono::duration<double>(interval_))) {
-            const Renewal renewal = renew(provider, history);
+            const HistoryRenewal renewal = renew(provider, history);
             for (const Change& change : renewal.changes)
                 if (!onlyProblems_ || isProblem(change.urgency) || isProblem(change.urgencyBefore))
                     out.write(timeStamp(change.time) + " " +
@@ -193,7 +193,7 @@ private:
         return ExitCode::success;
     }
 
-    void update(WatchView& view, const Renewal& renewal) const
+    void update(WatchView& view, const HistoryRenewal& renewal) const
     {
         view.add(renewal.changes);
         view.setFailure(renewal.failure);

@@ -25,7 +25,8 @@ constexpr SlotNumber minuteOf(SlotNumber slot)
 // number 0 is that of nothing recorded, which is the least urgent.
 unsigned moreUrgent(unsigned earlier, unsigned later);
 
-// The readings and states of one sensor. Has a fixed size, and is written to files as it is.
+// The readings and states of one sensor. An object has a fixed size and is written to files as it
+// is.
 class Samples {
 public:
     static constexpr SlotNumber slotsKept = 360;
@@ -49,7 +50,7 @@ public:
 
     // Adds a sample to the slot and to its minute, the newest ones.
     void add(SlotNumber slot, const Sensor& sensor);
-    // Remove the sample of that time.
+    // Remove the sample of the slot or of the minute.
     void clearSlot(SlotNumber slot);
     void clearMinute(SlotNumber minute);
 

@@ -20,8 +20,8 @@ namespace Tools {
 // time between. Where it is set back, what was recorded of later times is discarded.
 class SensorHistory {
 public:
-    // Of further sensors nothing is recorded. Sensors that are gone are forgotten where there are
-    // as many as sensors that are there, and a hundred.
+    // The greatest number of sensors that have a history. Sensors that are gone are forgotten where
+    // there are a hundred more of them than of present ones.
     static constexpr std::size_t maximumSensors = 10'000;
 
     static SlotNumber slotOf(std::chrono::system_clock::time_point time);

@@ -61,19 +61,20 @@ constexpr std::array<std::pair<std::string_view, Unit>, 10> channelKinds = {{
 }};
 
 // The elements with units of their own, of a kind or, where that is empty, of all.
-struct Element {
+struct ElementUnit {
     std::string_view kind;
     std::string_view name;
     Unit unit;
 };
-constexpr std::array elements = {Element{"", "alarm", {""}}, Element{"", "beep", {"_enabled"}},
-    Element{"", "fault", {""}}, Element{"fan", "input", {"_rpm"}}, Element{"fan", "max", {"_rpm"}},
-    Element{"fan", "min", {"_rpm"}}, Element{"fan", "target", {"_rpm"}},
-    Element{"power", "accuracy", {"", Scale::micro}},
-    Element{"power", "average_interval", {"_seconds", Scale::milli}},
-    Element{"power", "average_interval_max", {"_seconds", Scale::milli}},
-    Element{"power", "average_interval_min", {"_seconds", Scale::milli}},
-    Element{"temp", "type", {""}}};
+constexpr std::array elements = {ElementUnit{"", "alarm", {""}},
+    ElementUnit{"", "beep", {"_enabled"}}, ElementUnit{"", "fault", {""}},
+    ElementUnit{"fan", "input", {"_rpm"}}, ElementUnit{"fan", "max", {"_rpm"}},
+    ElementUnit{"fan", "min", {"_rpm"}}, ElementUnit{"fan", "target", {"_rpm"}},
+    ElementUnit{"power", "accuracy", {"", Scale::micro}},
+    ElementUnit{"power", "average_interval", {"_seconds", Scale::milli}},
+    ElementUnit{"power", "average_interval_max", {"_seconds", Scale::milli}},
+    ElementUnit{"power", "average_interval_min", {"_seconds", Scale::milli}},
+    ElementUnit{"temp", "type", {""}}};
 
 // The attributes of whole chips.
 struct ChipAttribute {
@@ -100,18 +101,19 @@ std::string cleaned(std::string_view text)
 }
 
 // An attribute such as temp1_max: the element max of the sensor temp1.
-struct Attribute {
+struct ExportedAttribute {
     std::string sensor;
     std::string element; // "label" for one that is a text
     std::string metric;
     Scale scale = Scale::one;
 };
 
-std::optional<Attribute> attributeOf(std::string_view name)
+std::optional<ExportedAttribute> attributeOf(std::string_view name)
 {
     for (const ChipAttribute& each : chipAttributes)
         if (name == each.name)
-            return Attribute{std::string(name) + "0", "", std::string(each.metric), each.scale};
+            return ExportedAttribute{
+                std::string(name) + "0", "", std::string(each.metric), each.scale};
     constexpr std::string_view digits = "0123456789";
     const std::size_t kindEnd = std::min(name.find_first_of(digits), name.size());
     const std::size_t sensorEnd = std::min(name.find_first_not_of(digits, kindEnd), name.size());
@@ -124,7 +126,7 @@ std::optional<Attribute> attributeOf(std::string_view name)
         return std::nullopt;
     element.remove_prefix(element.empty() ? 0 : 1);
     const auto* const own =
-        std::find_if(elements.begin(), elements.end(), [&](const Element& each) {
+        std::find_if(elements.begin(), elements.end(), [&](const ElementUnit& each) {
             return each.name == element && (each.kind.empty() || each.kind == kind);
         });
     const Unit unit = own == elements.end() ? known->second : own->unit;
@@ -132,7 +134,7 @@ std::optional<Attribute> attributeOf(std::string_view name)
     if (!element.empty() && element != "input")
         (metric += '_') += cleaned(element);
     metric += unit.suffix;
-    return Attribute{
+    return ExportedAttribute{
         std::string(name.substr(0, sensorEnd)), std::string(element), metric, unit.scale};
 }
 
@@ -190,7 +192,8 @@ public:
     }
 
 private:
-    void addAttribute(const Attribute& attribute, const std::string& chip, const Files::path& file)
+    void addAttribute(
+        const ExportedAttribute& attribute, const std::string& chip, const Files::path& file)
     {
         Labels labels;
         labels.add("chip", chip);

@@ -6,8 +6,6 @@
 #include "tools/metrics/HarvestMetrics.h"
 #include "tools/serve/FreedMemory.h"
 
-#include <malloc.h>
-
 #include <utility>
 
 namespace Tools {
@@ -57,7 +55,7 @@ std::shared_ptr<const UnsentText> MetricsResource::write(ExpositionForm form)
     addHarvest(exposition, *harvest, sensors_);
     harvest.reset();
     if (count >= largeAnswer)
-        ::malloc_trim(0);
+        returnFreedMemory();
     addMore_(exposition);
     std::string text = std::move(exposition).finish();
     latestSize_ = text.size();

@@ -42,8 +42,9 @@ std::string_view operationOf(const Host::CimXml::Message& message)
 
 } // namespace
 
-// A counter that begins with its first request has no rate that includes it. All results of each
-// operation would be too many series: those other than "ok" begin when they occur.
+// The counters of the result "ok" are there from the start: one that begins with its first request
+// has no rate that includes it. Those of other results begin when they occur, since all results of
+// all operations would be too many series.
 RequestCounts::RequestCounts(Host::CimXml::OperationHandler& handler) : handler_(handler)
 {
     for (const auto& form : Host::CimXml::offeredOperations())

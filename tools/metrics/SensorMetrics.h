@@ -25,8 +25,8 @@ struct SensorTexts {
 };
 
 // Writes the readings, limits, states and health of sensors. From one exposition to the next, as a
-// rule only the numbers of readings change: the other lines of a sensor are kept until something
-// else of it does. Thread-safe.
+// rule only the numbers of readings change: the other lines of a sensor are kept until another
+// value of it changes. Thread-safe.
 class SensorMetrics {
 public:
     // Keeps the lines of a machine of at most so many sensors, and none of a larger one.

@@ -69,9 +69,9 @@ private:
     std::condition_variable_any changed_;
     std::set<Subscription*> subscriptions_;
     std::vector<Known> known_; // what was published last
-    Event list_;               // of it, made when it is needed
+    Event list_;               // the event with known_; null until it is needed
     std::vector<std::string> lostSources_;
-    Event sources_; // of them; null before they are published
+    Event sources_; // the event with lostSources_; null before they are published
     std::optional<Clock::time_point> published_;
     bool isAwaited_ = false; // whether publish() has to be called soon
     bool hasBegun_ = false;  // whether somebody has subscribed since the last waitUntil()

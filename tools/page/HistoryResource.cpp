@@ -21,10 +21,13 @@ using Host::Http::Representation;
 constexpr std::size_t maximumDevices = 6;
 constexpr int secondsOfMinute = secondsOfSlot * slotsOfMinute;
 
-// A reason not to answer.
-class Problem : public std::runtime_error {
+// The reason for which a request is refused.
+class RequestProblem : public std::runtime_error {
 public:
-    Problem(unsigned status, const char* reason) : std::runtime_error(reason), status_(status) {}
+    RequestProblem(unsigned status, const char* reason)
+        : std::runtime_error(reason), status_(status)
+    {
+    }
 
     unsigned status() const { return status_; }
 
@@ -38,7 +41,7 @@ struct Query {
     bool isThinned = false;
 };
 
-// Throws Problem.
+// Throws RequestProblem.
 Query parse(const Host::Http::RequestHead& head)
 {
     Query query;
@@ -47,22 +50,22 @@ Query parse(const Host::Http::RequestHead& head)
             query.span = value;
         } else if (name == "device") {
             if (std::find(query.devices.begin(), query.devices.end(), value) != query.devices.end())
-                throw Problem(400, "a device is there twice");
+                throw RequestProblem(400, "a device is there twice");
             query.devices.push_back(std::move(value));
         } else if (name == "points") {
             if (value != std::to_string(thinnedSamples))
-                throw Problem(400, "points can be 60 only");
+                throw RequestProblem(400, "points can be 60 only");
             query.isThinned = true;
         }
     }
     if (query.span != "hour" && query.span != "day")
-        throw Problem(400, "span must be hour or day");
+        throw RequestProblem(400, "span must be hour or day");
     if (query.isThinned && query.span == "day")
-        throw Problem(400, "points needs the span hour");
+        throw RequestProblem(400, "points needs the span hour");
     if (query.devices.size() > maximumDevices)
-        throw Problem(400, "there can be at most 6 devices");
+        throw RequestProblem(400, "there can be at most 6 devices");
     if (query.devices.empty() && !query.isThinned)
-        throw Problem(400, "without devices, points must be 60");
+        throw RequestProblem(400, "without devices, points must be 60");
     return query;
 }
 
@@ -78,7 +81,7 @@ void append(std::string& json, const Query& query, const std::string& deviceId,
         appendHour(json, deviceId, samples, newest);
 }
 
-// Throws Problem.
+// Throws RequestProblem.
 std::string historyOf(const SensorHistory& history, const Query& query)
 {
     std::string sensors;
@@ -90,7 +93,7 @@ std::string historyOf(const SensorHistory& history, const Query& query)
     if (query.devices.empty())
         history.visitPresent(visit);
     else if (!history.visit(query.devices, visit))
-        throw Problem(404, "nothing was recorded of the devices");
+        throw RequestProblem(404, "nothing was recorded of the devices");
 
     const bool isOfMinutes = query.span == "day" || query.isThinned;
     const SlotNumber endOfMinutes = (minuteOf(end - 1) + 1) * secondsOfMinute;
@@ -101,7 +104,7 @@ std::string historyOf(const SensorHistory& history, const Query& query)
            R"(, "sensors": [)" + sensors + "]}\n";
 }
 
-std::string errorText(const Problem& problem)
+std::string errorText(const RequestProblem& problem)
 {
     std::string json = "{\"error\": ";
     appendString(json, problem.what());
@@ -124,12 +127,12 @@ Representation HistoryResource::represent(const Host::Http::RequestHead& head)
     try {
         const Query query = parse(head);
         if (history_ == nullptr)
-            throw Problem(404, "the server keeps no history");
+            throw RequestProblem(404, "the server keeps no history");
         if (query.devices.empty())
             return representationOf(ofAll_.get(), fields);
         return representationOf(
             std::make_shared<const UnsentText>(historyOf(*history_, query), unsent_), fields);
-    } catch (const Problem& problem) {
+    } catch (const RequestProblem& problem) {
         return {fields, std::make_shared<const std::string>(errorText(problem)), problem.status()};
     }
 }

@@ -18,12 +18,13 @@
 
 namespace Tools {
 
-// The page and what it is fed from, as resources of a server.
+// The page and what its scripts read, as resources of a server.
 class PageService {
 public:
-    // Keeps the history, where it does, in the folder for that; without one in memory only. Without
-    // the files of the page in the folder, the page says so and the rest works. The harvests must
-    // outlive it. Throws std::runtime_error where the history cannot be kept.
+    // Where there is a history, it is written to its folder; without one it is in memory only.
+    // Where `folder` lacks the files of the page, requests for the page are refused with the
+    // reason, and the other resources work. The harvests must outlive the object. Throws
+    // std::runtime_error where the history cannot be kept.
     PageService(SingleFlight<Harvest>& harvests, bool isHistoryKept,
         const std::optional<std::string>& historyFolder, const std::filesystem::path& folder);
 

@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-// What the page is fed from, which schema/sensor-profile-api.openapi.yaml describes.
+// What the scripts of the page read, which schema/sensor-profile-api.openapi.yaml describes.
 
 #pragma once
 

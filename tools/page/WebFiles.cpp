@@ -24,7 +24,7 @@ constexpr const char* policy =
     "default-src 'none'; script-src 'self'; style-src 'self'; connect-src 'self'; "
     "img-src 'self'; base-uri 'none'; form-action 'self'; frame-ancestors 'none'";
 
-// By the end of their names; other files are not served.
+// The content types of files by the ends of their names; other files are not served.
 constexpr std::array<std::pair<std::string_view, const char*>, 4> contentTypes = {{
     {".js", "text/javascript; charset=utf-8"},
     {".css", "text/css; charset=utf-8"},
@@ -64,7 +64,7 @@ bool acceptsGzip(const Host::Http::RequestHead& head)
         [](const auto& each) { return Host::equalNames(each.value, "gzip") && each.weight > 0; });
 }
 
-// Returns whether the client has what has the tag. The comparison is weak (RFC 9110, 8.8.3.2).
+// Returns whether If-None-Match has the entity tag. The comparison is weak (RFC 9110, 8.8.3.2).
 bool isKnown(const Host::Http::RequestHead& head, const std::string& entityTag)
 {
     const auto known = Host::Http::weightedElements(head, "If-None-Match");
@@ -97,7 +97,8 @@ Host::Http::Representation FileResource::represent(const Host::Http::RequestHead
     fields.push_back({"Vary", "Accept-Encoding"});
     if (isCompressed)
         fields.push_back({"Content-Encoding", "gzip"});
-    // The content, which is not sent with status 304, has the length that is (RFC 9110, 8.6).
+    // A response with status 304 has the Content-Length of the content that it does not send (RFC
+    // 9110, 8.6).
     return {std::move(fields), form.content, isKnown(head, form.entityTag) ? 304U : 200U};
 }
 

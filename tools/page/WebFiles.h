@@ -13,7 +13,7 @@
 namespace Tools {
 
 // A file of the page, which clients may keep as long as its entity tag is the same (RFC 9110, 8.8.3
-// and 13.1.2). Is compressed where the client accepts that.
+// and 13.1.2). It is sent compressed where the client accepts that.
 class FileResource : public Host::Http::Resource {
 public:
     struct Form {

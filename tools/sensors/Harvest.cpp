@@ -46,13 +46,13 @@ Sensors readInstances(const Host::Manager& manager)
 
 Sensors readRecords()
 {
-    std::vector<Vorn::SensorProfileProvider::Sensor> records;
+    std::vector<SensorRecord> records;
     getSensorInstances(records);
     const Vorn::SensorProfileProvider::SensorIndex index(records);
     Sensors sensors;
     sensors.reserve(index.size());
-    Vorn::SensorProfileProvider::Sensor copy; // keeps its memory from record to record
-    for (const auto* const record : index.inOrder()) {
+    SensorRecord copy; // keeps its memory from record to record
+    for (const SensorRecord* const record : index.inOrder()) {
         copy = *record;
         sensors.emplace_back(copy);
     }

@@ -166,7 +166,7 @@ Sensor::Sensor(const Host::Instance& from) : instance(&from)
         limits.at(i) = quantityOf(properties.number(limitKinds.at(i).property), modifier);
 }
 
-Sensor::Sensor(Vorn::SensorProfileProvider::Sensor& record)
+Sensor::Sensor(SensorRecord& record)
 {
     identify(record.getElementName(), record.deviceID());
     possibleStates = wordsOf(record.getPossibleStates(), std::identity());

@@ -25,6 +25,9 @@ class Sensor;
 
 namespace Tools {
 
+// The provider's record of a sensor.
+using SensorRecord = Vorn::SensorProfileProvider::Sensor;
+
 // A reading or a limit: `value` times ten to the power of `modifier`. Readings and limits of a
 // sensor have the same modifier and are rounded alike, so that no reading at a limit is shown below
 // it.
@@ -66,7 +69,7 @@ struct Sensor {
     explicit Sensor(const Host::Instance& from);
     // Interprets a record of the provider, as if it were the instance made of it. The record counts
     // how often it is read.
-    explicit Sensor(Vorn::SensorProfileProvider::Sensor& record);
+    explicit Sensor(SensorRecord& record);
 
     // Sets the names that the provider gives a node.
     void setNames(const std::string& description, std::string_view itsPath);

@@ -9,13 +9,20 @@
 namespace Tools {
 
 // Has the allocator keep the memory of an answer for the next one: mapping it again page by page
-// takes a third of the time that its objects take. Each arena of the allocator keeps up to 8 MiB,
-// so that their number is limited to that of the workers. REQUIRES: the process has one thread.
+// takes a third of the time in which its objects are made. Each arena of the allocator keeps up to
+// 8 MiB, so that their number is limited to that of the workers. REQUIRES: the process has one
+// thread.
 inline void keepFreedMemory(std::size_t workers)
 {
     ::mallopt(M_ARENA_MAX, static_cast<int>(workers));
     ::mallopt(M_MMAP_THRESHOLD, 2 << 20);
     ::mallopt(M_TRIM_THRESHOLD, 8 << 20);
+}
+
+// Returns the free memory of the allocator to the system.
+inline void returnFreedMemory()
+{
+    ::malloc_trim(0);
 }
 
 // The number of objects from which on the free memory is returned to the system after an answer:

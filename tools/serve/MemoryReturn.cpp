@@ -5,8 +5,6 @@
 #include "host/cimxml/Message.h"
 #include "tools/serve/FreedMemory.h"
 
-#include <malloc.h>
-
 #include <utility>
 
 namespace Tools {
@@ -15,7 +13,8 @@ namespace {
 
 using Host::CimXml::Response;
 
-// In bytes; usual messages have a few hundred. The parsed message takes ten times as much and more.
+// The least size of a large message; usual ones have a few hundred bytes. The parsed message takes
+// ten times as much and more.
 constexpr std::size_t largeMessage = std::size_t{64} << 10;
 
 class ReturningResponse : public Response {
@@ -24,7 +23,7 @@ public:
     ~ReturningResponse() override
     {
         answer_.reset();
-        ::malloc_trim(0);
+        returnFreedMemory();
     }
     ReturningResponse(const ReturningResponse&) = delete;
     ReturningResponse& operator=(const ReturningResponse&) = delete;
@@ -48,7 +47,7 @@ std::unique_ptr<Response> MemoryReturn::answer(
         answer = handler_.answer(message, caller);
     } catch (...) {
         if (isLarge)
-            ::malloc_trim(0);
+            returnFreedMemory();
         throw;
     }
     if (answer->heldObjects() < largeAnswer && !isLarge)

@@ -12,7 +12,7 @@
 
 namespace Tools {
 
-// In the texts that clients have yet to fetch. Of the metrics of 10,000 sensors, three fit.
+// The size of all texts that clients have yet to fetch. Three of the metrics of 10,000 sensors fit.
 inline constexpr std::size_t maximumUnsentBytes = std::size_t{64} << 20;
 
 // The answer to clients whose text does not fit.

@@ -10,7 +10,7 @@
 
 namespace Vorn {
 
-// Where `sensorctl collect` writes unless it is told otherwise.
+// The file that `sensorctl collect` writes by default.
 inline constexpr const char* defaultCollection = "/run/sensor-profile/ipmi.json";
 
 // Returns the time since the machine started, which also passes while it is suspended and does not

@@ -113,7 +113,7 @@ TEST_F(RequestTest, OperationThatThrowsIsAnInternalError)
     operations.doFirst([](const Message&, const Caller&) { throw std::runtime_error("oh"); });
     const HttpReply reply = ask(post());
     EXPECT_EQ(reply.status, 500);
-    EXPECT_EQ(reply.body, "the request failed; the log tells why\n");
+    EXPECT_EQ(reply.body, "the request failed; the log has the reason\n");
 }
 
 TEST_F(RequestTest, OperationWithoutMemoryEndsItsConnectionOnly)

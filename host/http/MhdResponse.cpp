@@ -1,6 +1,6 @@
 // Copyright The sensor-profile authors. SPDX-License-Identifier: Apache-2.0
 
-#include "host/http/Response.h"
+#include "host/http/MhdResponse.h"
 
 #include "host/http/PendingAnswer.h"
 #include "host/http/StreamedAnswer.h"
@@ -32,35 +32,35 @@ MHD_Response* responseFrom(Answer& answer)
 
 } // namespace
 
-void Response::Freeing::operator()(MHD_Response* response) const
+void MhdResponse::Freeing::operator()(MHD_Response* response) const
 {
     ::MHD_destroy_response(response);
 }
 
-Response::Response(MHD_Response* response) : response_(response)
+MhdResponse::MhdResponse(MHD_Response* response) : response_(response)
 {
     if (!response_)
         throw std::bad_alloc();
 }
 
-Response Response::whole(const std::string& text)
+MhdResponse MhdResponse::whole(const std::string& text)
 {
     // The library does not change the text.
-    return Response(::MHD_create_response_from_buffer(
+    return MhdResponse(::MHD_create_response_from_buffer(
         text.size(), const_cast<char*>(text.data()), MHD_RESPMEM_PERSISTENT));
 }
 
-Response Response::inPieces(PendingAnswer& answer)
+MhdResponse MhdResponse::inPieces(PendingAnswer& answer)
 {
-    return Response(responseFrom(answer));
+    return MhdResponse(responseFrom(answer));
 }
 
-Response Response::inPieces(StreamedAnswer& answer)
+MhdResponse MhdResponse::inPieces(StreamedAnswer& answer)
 {
-    return Response(responseFrom(answer));
+    return MhdResponse(responseFrom(answer));
 }
 
-void Response::add(const HeaderField& field)
+void MhdResponse::add(const HeaderField& field)
 {
     // The library refuses an empty value. A parser removes the blank.
     const char* const value = field.value.empty() ? " " : field.value.c_str();
@@ -68,12 +68,12 @@ void Response::add(const HeaderField& field)
         throw std::bad_alloc();
 }
 
-void Response::endConnection()
+void MhdResponse::endConnection()
 {
     add({"Connection", "close"});
 }
 
-bool Response::queue(MHD_Connection& connection, unsigned status)
+bool MhdResponse::queue(MHD_Connection& connection, unsigned status)
 {
     return ::MHD_queue_response(&connection, status, response_.get()) == MHD_YES;
 }

@@ -17,13 +17,13 @@ class StreamedAnswer;
 
 // The header fields and the body of an answer, as libmicrohttpd sends them. All functions throw
 // std::bad_alloc.
-class Response {
+class MhdResponse {
 public:
     // Creates one whose body is the text, which must not change until the request ends.
-    static Response whole(const std::string& text);
+    static MhdResponse whole(const std::string& text);
     // Creates one whose body is read from the answer, which must exist until the request ends.
-    static Response inPieces(PendingAnswer& answer);
-    static Response inPieces(StreamedAnswer& answer);
+    static MhdResponse inPieces(PendingAnswer& answer);
+    static MhdResponse inPieces(StreamedAnswer& answer);
 
     void add(const HeaderField& field);
     // Has the connection closed after the answer, which says so.
@@ -37,7 +37,7 @@ private:
         void operator()(MHD_Response* response) const;
     };
 
-    explicit Response(MHD_Response* response);
+    explicit MhdResponse(MHD_Response* response);
 
     std::unique_ptr<MHD_Response, Freeing> response_;
 };
