@@ -82,7 +82,7 @@ INSTANTIATE_TEST_SUITE_P(All, AssociationRowTest, ValuesIn(rows),
 
 // ---- The four ends ----
 
-TEST_P(AssociationRowTest, NamesTheTargetAndTellsTheBroker)
+TEST_P(AssociationRowTest, NamesTheTargetAndTracesToTheBroker)
 {
     EXPECT_STREQ(nameFrom(GetParam().source, GetParam().association), GetParam().target);
     EXPECT_EQ(rc_.rc, CMPI_RC_OK);
@@ -211,7 +211,7 @@ TEST_F(AssociationTargetTest, ASourceThatIsNoPathHasNoTarget)
     EXPECT_TRUE(messages_.empty());
 }
 
-TEST_F(AssociationTargetTest, ASourceWhoseClassIsNotToldHasNoTarget)
+TEST_F(AssociationTargetTest, ASourceWhoseClassIsNotReturnedHasNoTarget)
 {
     for (const FaultManner manner : {FaultManner::nullResult, FaultManner::handleless}) {
         FaultyBroker faulty(broker_);
@@ -223,7 +223,7 @@ TEST_F(AssociationTargetTest, ASourceWhoseClassIsNotToldHasNoTarget)
     }
 }
 
-TEST_F(AssociationTargetTest, ASourceWhoseNamespaceIsNotToldHasNoTargetPath)
+TEST_F(AssociationTargetTest, ASourceWhoseNamespaceIsNotReturnedHasNoTargetPath)
 {
     FaultyBroker faulty(broker_);
     faulty.plan({BrokerCall::getNameSpace, 1, FaultManner::nullResult});

@@ -202,7 +202,7 @@ TEST_F(CapabilitiesEnumerationTest, AnObjectPathThatCannotBeMadeEndsTheEnumerati
     }
 }
 
-TEST_F(CapabilitiesEnumerationTest, WithoutAStatusAMissingPathIsToldToTheTraceAlone)
+TEST_F(CapabilitiesEnumerationTest, WithoutAStatusAMissingPathIsTracedOnly)
 {
     FaultyBroker faulty(broker_);
     faulty.plan({BrokerCall::newObjectPath, 1, FaultManner::nullResult});

@@ -203,7 +203,7 @@ TEST_F(CapabilitiesInstanceBuilderTest, AnArrayThatCannotBeMadeIsReportedAndLeft
     }
 }
 
-TEST_F(CapabilitiesInstanceBuilderTest, WithoutAStatusAMissingArrayIsToldToTheTraceAlone)
+TEST_F(CapabilitiesInstanceBuilderTest, WithoutAStatusAMissingArrayIsTracedOnly)
 {
     const CMPIInstance* const made =
         buildWith({BrokerCall::newArray, 1, FaultManner::nullResult}, nullptr);

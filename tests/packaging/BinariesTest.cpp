@@ -67,7 +67,7 @@ TEST_P(InstalledBinaryTest, HasAStackThatIsGuardedAndNotExecutable)
         std::regex(R"(GNU_STACK +0x\w+ 0x\w+ 0x\w+ 0x\w+ 0x\w+ RW +)")));
 }
 
-TEST_P(InstalledBinaryTest, IsToldNoFoldersOfLibraries)
+TEST_P(InstalledBinaryTest, NamesNoFoldersOfLibraries)
 {
     EXPECT_THAT(readelf("--dynamic", GetParam()), Not(HasSubstr("RPATH")));
     EXPECT_THAT(readelf("--dynamic", GetParam()), Not(HasSubstr("RUNPATH")));

@@ -234,7 +234,7 @@ std::string partOf(const std::string& page, const std::string& start, const std:
 }
 
 // Each published property is named in the section of its class.
-TEST(OperationsPageTest, TellsOfEveryProperty)
+TEST(OperationsPageTest, DescribesEveryProperty)
 {
     const std::map<std::string, std::string> starts = {{"ZUMLO_NumericSensor", "\nA sensor, "},
         {"ZUMLO_ComputerSystem", "\nThe computer, "},

@@ -129,7 +129,7 @@ TEST_F(ElementCapabilitiesAssociationFaultTest, AReferenceThatCannotBeMadeIsLeft
         }
 }
 
-TEST_F(ElementCapabilitiesAssociationFaultTest, AReferenceWhosePathIsNotToldIsLeftOutOfTheNames)
+TEST_F(ElementCapabilitiesAssociationFaultTest, AReferenceWhosePathIsNotReturnedIsLeftOutOfTheNames)
 {
     for (const FaultManner manner : undelivered) {
         const auto request =
@@ -162,7 +162,7 @@ TEST_F(ElementCapabilitiesAssociationFaultTest, AnAssociatorThatCannotBeMadeIsPa
 }
 
 // The status of the request is not passed to the call that returns the path of an instance.
-TEST_F(ElementCapabilitiesAssociationFaultTest, APathThatIsNotToldLeavesTheStatus)
+TEST_F(ElementCapabilitiesAssociationFaultTest, APathThatIsNotReturnedLeavesTheStatus)
 {
     const Fault fault = {BrokerCall::getObjectPath, 2, FaultManner::nullResult}; // the last
     for (const RequestKind& kind : {oneInstance, requestsFromCapabilities[ReferenceNames]})

@@ -97,7 +97,7 @@ TEST_P(PathFailureTest, AnInstanceWithoutAPathIsANullInstance)
     EXPECT_TRUE(request->messages.empty());
 }
 
-TEST_P(PathFailureTest, AnInstanceWhosePathIsNotToldEqualsNothing)
+TEST_P(PathFailureTest, AnInstanceWhosePathIsNotReturnedEqualsNothing)
 {
     const auto request = run(Operation::instanceByPath, {BrokerCall::getObjectPath, 1, GetParam()});
     EXPECT_EQ(request->answer.instances().size(), 0U);

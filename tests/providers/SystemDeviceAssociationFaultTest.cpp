@@ -124,7 +124,7 @@ TEST_F(SystemDeviceAssociationFaultTest, AnAssociatorThatCannotBeMadeIsPassedOnA
 }
 
 // The status of the request is not passed to the call that returns the path of an instance.
-TEST_F(SystemDeviceAssociationFaultTest, APathThatIsNotToldLeavesTheStatus)
+TEST_F(SystemDeviceAssociationFaultTest, APathThatIsNotReturnedLeavesTheStatus)
 {
     const Fault fault = {BrokerCall::getObjectPath, 2, FaultManner::nullResult}; // the last
     for (const RequestKind& kind : {oneInstance, requestsFromSystem[ReferenceNames]})

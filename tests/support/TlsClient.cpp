@@ -60,10 +60,10 @@ std::string TlsClient::subject() const
     std::array<char, 256> text{};
     std::size_t size = text.size();
     const int imported = ::gnutls_x509_crt_import(certificate, shown, GNUTLS_X509_FMT_DER);
-    const int told = ::gnutls_x509_crt_get_dn(certificate, text.data(), &size);
+    const int result = ::gnutls_x509_crt_get_dn(certificate, text.data(), &size);
     ::gnutls_x509_crt_deinit(certificate);
     require(imported);
-    require(told);
+    require(result);
     return text.data();
 }
 

@@ -63,7 +63,7 @@ TEST_F(ClassesTest, KindAndProblemsNarrowTheClassOfSensors)
     expectSame({"--problems"});
 }
 
-TEST_F(ClassesTest, TableShowsWhatTellsObjectsApartAndTheirStates)
+TEST_F(ClassesTest, TableShowsWhatDistinguishesObjectsAndTheirStates)
 {
     EXPECT_EQ(linesOf(listed("ZUMLO_ComputerSystem").out).front().substr(0, 4), "NAME");
     EXPECT_THAT(listed("ZUMLO_ComputerSystem").out,

@@ -228,7 +228,7 @@ std::string standardErrorOf(const std::string& command)
 
 class ConfigurationMistakesTest : public MountNamespaceTest {};
 
-TEST_F(ConfigurationMistakesTest, AreToldOnceInTheWordsOfSensors)
+TEST_F(ConfigurationMistakesTest, ArePrintedOnceInTheWordsOfSensors)
 {
     const BoundSysfs sysfs("desktop");
     const BoundSensorsConfiguration configuration("chip \"*-*\"\n"
@@ -248,7 +248,7 @@ TEST_F(ConfigurationMistakesTest, AreToldOnceInTheWordsOfSensors)
     }
 }
 
-TEST_F(ConfigurationMistakesTest, AreToldByWatchAtOnce)
+TEST_F(ConfigurationMistakesTest, ArePrintedByWatchAtOnce)
 {
     const BoundSysfs sysfs("desktop");
     const BoundSensorsConfiguration configuration("chip \"*-*\"\n"

@@ -103,7 +103,7 @@ std::string inManual(std::string name)
     return "\n.It Fl \\-" + name + " ";
 }
 
-TEST_F(ServeOptionsTest, EveryLimitHasTheDefaultThatTheManualTells)
+TEST_F(ServeOptionsTest, EveryLimitHasTheDefaultOfTheManual)
 {
     EXPECT_EQ(valuesOf(Tools::ServeOptions()), defaults());
     const std::string page =

@@ -48,7 +48,7 @@ public:
     const std::string& path() const { return path_; }
 
     // Returns the next message; an empty text when none arrives.
-    std::string told() const
+    std::string received() const
     {
         std::array<char, 256> text{};
         const ssize_t length = ::recv(socket_, text.data(), text.size(), 0);
@@ -93,7 +93,7 @@ TEST_F(ServeProcessTest, LogThatCannotBeWrittenAtTheStartIsAFailure)
     }
 }
 
-TEST_F(ServeProcessTest, StandardOutputTellsOfAFullStandardError)
+TEST_F(ServeProcessTest, StandardOutputReportsAFullStandardError)
 {
     const Ended ended = run(asIs(), {.program = script("exec " + sensorctl + " \"$@\" 2>/dev/full"),
                                         .environment = {{"RYNLOG_LOG", ""}}});
@@ -163,16 +163,16 @@ TEST_F(ServeProcessTest, ReaderOfTheGreetingMayLeave)
     EXPECT_EQ(server.end(SIGTERM).code, 0);
 }
 
-TEST_F(ServeProcessTest, ServiceManagerIsToldWhatItDoes)
+TEST_F(ServeProcessTest, ServiceManagerIsNotifiedOfItsState)
 {
     const ServiceManager manager(folder_.path() / "notify");
     ServerProcess server(withModel(), {{"NOTIFY_SOCKET", manager.path()}});
-    EXPECT_EQ(manager.told(), "READY=1");
+    EXPECT_EQ(manager.received(), "READY=1");
     server.signal(SIGHUP);
-    EXPECT_EQ(manager.told(), "RELOADING=1");
-    EXPECT_EQ(manager.told(), "READY=1");
+    EXPECT_EQ(manager.received(), "RELOADING=1");
+    EXPECT_EQ(manager.received(), "READY=1");
     EXPECT_EQ(server.end(SIGTERM).code, 0);
-    EXPECT_EQ(manager.told(), "STOPPING=1");
+    EXPECT_EQ(manager.received(), "STOPPING=1");
 }
 
 TEST_F(ServeProcessTest, JournalGetsPrioritiesAndNoSecondTime)
@@ -266,7 +266,7 @@ TEST_F(ServeProcessTest, RootIsRenouncedWhereOnlyRootCanReadTheTool)
     EXPECT_EQ(server.end(SIGTERM).code, 0);
 }
 
-TEST_F(ServeProcessTest, ModelThatTheUserCannotReadIsTold)
+TEST_F(ServeProcessTest, ModelThatTheUserCannotReadIsReported)
 {
     if (::geteuid() != 0)
         return cannotRun("only root can renounce root");
@@ -284,7 +284,7 @@ TEST_F(ServeProcessTest, ModelThatTheUserCannotReadIsTold)
     }
 }
 
-TEST_F(ServeProcessTest, UserThatIsNotThereIsTold)
+TEST_F(ServeProcessTest, UserThatIsNotThereIsReported)
 {
     const Ended ended = failing(withModel({"--port", "0", "--user", "no-such-user"}));
     EXPECT_EQ(ended.code, 1);

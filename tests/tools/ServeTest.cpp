@@ -32,7 +32,7 @@ HttpClient beginRequest(std::uint16_t port)
     return client;
 }
 
-TEST_F(ServeTest, TellsWhereItIsAndAnswersThere)
+TEST_F(ServeTest, PrintsItsAddressAndAnswersThere)
 {
     ServerProcess server(withModel());
     EXPECT_THAT(server.output(),
@@ -95,7 +95,7 @@ TEST_F(ServeTest, KilledServerStartsAgainOnTheSamePort)
     }
 }
 
-TEST_F(ServeTest, PortInUseIsTold)
+TEST_F(ServeTest, PortInUseIsReported)
 {
     const ServerProcess server(withModel());
     const std::string port = std::to_string(server.port());
@@ -156,7 +156,7 @@ TEST_F(ServeTest, FilesThatCannotBeUsedAreNamed)
                                         "invalid literal; last read: 'no'\n");
 }
 
-TEST_F(ServeTest, ProviderThatIsNoneIsToldAtTheStart)
+TEST_F(ServeTest, ProviderThatIsNoneIsReportedAtTheStart)
 {
     const auto problem = [&](const std::string& file) {
         const Ended ended = failing(withModel({"--port", "0", "--provider", file}));
@@ -188,7 +188,7 @@ TEST_F(ServeTest, OptionsThatMakeNoSenseAreWrongUsage)
     }
 }
 
-TEST_F(ServeTest, HelpTellsTheDefaults)
+TEST_F(ServeTest, HelpHasTheDefaults)
 {
     const Ended ended = run({"serve", "--help"});
     EXPECT_EQ(ended.code, 0);

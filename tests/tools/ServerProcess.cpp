@@ -87,7 +87,7 @@ std::uint16_t ServerProcess::port(const std::string& scheme) const
     const std::string text = output();
     const std::size_t address = text.find(" " + scheme + "://");
     if (address == std::string::npos)
-        throw std::runtime_error("not told: " + scheme);
+        throw std::runtime_error("no address was printed: " + scheme);
     const std::size_t end = text.find_first_of(" \n", address + 1);
     const std::size_t colon = text.rfind(':', end);
     return static_cast<std::uint16_t>(std::stoul(text.substr(colon + 1, end - colon - 1)));

@@ -41,7 +41,7 @@ TEST_F(ClassElementTest, WritesWhatAClassDeclares)
         R"(<PROPERTY NAME="Reading" TYPE="real64"></PROPERTY></CLASS>)");
 }
 
-TEST_F(ClassElementTest, TellsOriginAndInheritance)
+TEST_F(ClassElementTest, ShowsOriginAndInheritance)
 {
     ObjectSelection selection;
     selection.includeClassOrigin = true;

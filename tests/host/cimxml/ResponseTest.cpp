@@ -248,7 +248,7 @@ TEST_F(ResponseTest, SaysWhetherAnEnumerationGoesOn)
     EXPECT_EQ(pulled(std::nullopt), expected("TRUE", ""));
 }
 
-TEST_F(ResponseTest, TellsFailuresWithCodeAndText)
+TEST_F(ResponseTest, ReportsFailuresWithCodeAndText)
 {
     EXPECT_EQ(errorResponse(Message(call("GetInstance")), CMPI_RC_ERR_NOT_FOUND, "no \"x\" <here>"),
         head + R"(GetInstance"><ERROR CODE="6" DESCRIPTION="no &quot;x&quot; &lt;here&gt;">)" +

@@ -235,7 +235,7 @@ TEST_F(LimitsTest, AnswerThatIsAloneMayBeOfAnySize)
         EXPECT_EQ(ask(post()).body.size(), 1'000'000U);
 }
 
-TEST_F(LimitsTest, RequestsBeyondTheQueueAreToldToComeAgain)
+TEST_F(LimitsTest, RequestsBeyondTheQueueAreRefusedWithRetryAfter)
 {
     limits.workers = 1;
     limits.maximumQueue = 1;

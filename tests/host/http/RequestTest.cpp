@@ -16,7 +16,7 @@ protected:
     RequestTest() { start(); }
 };
 
-TEST_F(RequestTest, TellsTheOperationWhoAsks)
+TEST_F(RequestTest, PassesThePrincipalToTheOperation)
 {
     Caller seen;
     std::string method;

@@ -132,7 +132,7 @@ TEST_F(SignInTest, ClientThatAwaitsASignSignsInFirst)
     EXPECT_EQ(client.receive().status, 200);
 }
 
-TEST_F(SignInTest, FailuresAreToldLaterAndLater)
+TEST_F(SignInTest, FailuresAreAnsweredLaterAndLater)
 {
     start();
     const Testing::LogCapture log(6000);
@@ -147,7 +147,7 @@ TEST_F(SignInTest, FailuresAreToldLaterAndLater)
         textsIn(log), std::vector<std::string>(3, "wrong password for \"ann\" from 127.0.0.1"));
 }
 
-TEST_F(SignInTest, WhoSignsInIsToldToTheLogOnce)
+TEST_F(SignInTest, WhoSignsInIsLoggedOnce)
 {
     start();
     const Testing::LogCapture log(6000);
@@ -159,7 +159,7 @@ TEST_F(SignInTest, WhoSignsInIsToldToTheLogOnce)
     EXPECT_EQ(log.log().size(), 2U);
 }
 
-TEST_F(SignInTest, WhoAskedForWhatIsToldToThoseWhoWantToKnow)
+TEST_F(SignInTest, WhoAskedForWhatIsLoggedAsADetail)
 {
     start();
     EXPECT_EQ(ask(post(right)).status, 200);
@@ -235,7 +235,7 @@ TEST_F(SignInTest, NewPasswordsCountAtOnce)
     EXPECT_EQ(ask(post(as("Ym9iOnNlY3JldA=="))).status, 200);
 }
 
-TEST_F(SignInTest, WhoWaitsTooLongIsToldWhenToComeAgain)
+TEST_F(SignInTest, WhoWaitsTooLongIsRefusedWithRetryAfter)
 {
     limits.signInDelay = 60s;
     start();

@@ -200,7 +200,7 @@ TEST_F(TlsTest, FilesThatCannotBeUsedAreNamed)
         problemWith("one.crt", "locked"), "locked: the private key is locked with a password");
 }
 
-TEST_F(TlsTest, CertificateWhoseTimeIsOverIsToldToTheLog)
+TEST_F(TlsTest, CertificateWhoseTimeIsOverIsLogged)
 {
     const std::string command = "openssl x509 -in '" + file("one.crt") + "' -signkey '" +
                                 file("one.key") + "' -days -1 -out '" + file("old.crt") +

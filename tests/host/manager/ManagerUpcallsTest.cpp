@@ -94,7 +94,7 @@ TEST_F(ManagerUpcallsTest, AnErrorReachesTheCallerWithItsMessage)
         "code 2: not for you");
 }
 
-TEST_F(ManagerUpcallsTest, UnknownAndUnservedClassesAreToldApart)
+TEST_F(ManagerUpcallsTest, UnknownAndUnservedClassesAreDistinguished)
 {
     script("Boxes", [this](const ProviderCall& call) {
         CMPIStatus status = ok;

@@ -76,7 +76,7 @@ TEST_F(RepositoryTest, ListsTheRootsForNoClass)
     EXPECT_THAT(repository_->subclasses("root", "", Depth::deep), IsEmpty());
 }
 
-TEST_F(RepositoryTest, TellsDescentAtAnyDistance)
+TEST_F(RepositoryTest, FindsDescentAtAnyDistance)
 {
     EXPECT_TRUE(repository_->isDerivedFrom(testNameSpace, "LeftOne", "TOP"));
     EXPECT_TRUE(repository_->isDerivedFrom(testNameSpace, "LeftOne", "Left"));

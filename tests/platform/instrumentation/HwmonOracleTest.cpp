@@ -96,7 +96,7 @@ INSTANTIATE_TEST_SUITE_P(Machines, HwmonMachineTest,
 TEST_F(HwmonOracleTest, AWirelessCardThatSleepsHasNoReading)
 {
     const BoundSysfs sysfs("laptop");
-    const Testing::BindMount asleep("/proc/self/mem", "/sys/class/hwmon/hwmon5/temp1_input");
+    const Testing::BindMount unreadable("/proc/self/mem", "/sys/class/hwmon/hwmon5/temp1_input");
     EXPECT_EQ(compareWithSensors(), 12U);
     EXPECT_EQ(Testing::nodeAt(Testing::walk(), "/hwmon/iwlwifi_1-virtual-0/temp1").values,
         (NodeReading{.status = 13, .baseUnits = 2, .possibleStates = {{1}}}));
@@ -114,7 +114,7 @@ TEST_F(HwmonOracleTest, AttributesOfAnOldDriverAreInTheFolderOfItsDevice)
     EXPECT_EQ(Testing::walk().front().description, "Inlet");
 }
 
-// libsensors is not told what nobody may read (LibsensorsHooks.cpp).
+// libsensors does not see attributes that nobody may read (LibsensorsHooks.cpp).
 TEST_F(HwmonOracleTest, TheKernelOpensNoAttributeThatNobodyMayRead)
 {
     constexpr const char* writable = "/sys/bus/platform/drivers_probe";
@@ -199,7 +199,7 @@ const Shape shapes[] = {
     {"computesForAChipThatIsNotThere", "chip \"board-isa-0291\"\n  compute in1 @*2, @/2\n", {}},
     {"computesOnABusByItsAdapter",
         "bus \"i2c-0\" \"Adapter 3\"\nchip \"lm75-i2c-0-48\"\n  compute temp1 @-1, @+1\n",
-        {"lm75-i2c-1-48/temp1", "lm75-i2c-3-48/temp1"}}, // adapters are not told apart
+        {"lm75-i2c-1-48/temp1", "lm75-i2c-3-48/temp1"}}, // adapters are not distinguished
     {"computesOnAnyBus", "chip \"lm75-i2c-*-48\"\n  compute temp1 @-1, @+1\n",
         {"lm75-i2c-1-48/temp1", "lm75-i2c-3-48/temp1"}},
     {"refersToAnotherFeature", "chip \"board-*\"\n  compute in0 in1_input+@, @\n",

@@ -62,7 +62,7 @@ TEST(FileSinkTest, TimeIsUtcWhateverTheZone)
     EXPECT_GE(after, written);
 }
 
-TEST(FileSinkTest, TheTwoChannelsLeadWhereTheyAreToldTo)
+TEST(FileSinkTest, TheTwoChannelsLeadToTheirSettings)
 {
     const LogFile log, trace;
     const ScopedLogSettings settings({6000, log.sink(), trace.sink()});

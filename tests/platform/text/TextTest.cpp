@@ -130,7 +130,7 @@ TEST(EscapeTest, EscapesEveryControlCharacter)
     }
 }
 
-TEST(EscapeTest, DoublesABackslashWhereItMustBeToldFromAnEscape)
+TEST(EscapeTest, DoublesABackslashWhereItCouldBeAnEscape)
 {
     EXPECT_EQ(escapedForTheLog("\\n"), "\\\\n");
     EXPECT_NE(escapedForTheLog("\\n"), escapedForTheLog("\n"));

@@ -129,7 +129,7 @@ TEST_F(CollectSurroundingsTest, ACheckThatMayNotReadTheFileIsUnknown)
         testing::StartsWith("SENSORS UNKNOWN - model file " + file() + ": Permission denied"));
 }
 
-TEST_F(CollectSurroundingsTest, NobodyIsToldWhatIsNotPermitted)
+TEST_F(CollectSurroundingsTest, UserWithoutPermissionGetsTheReason)
 {
     if (::geteuid() != 0)
         return cannotRun("only root can run a command as nobody");
