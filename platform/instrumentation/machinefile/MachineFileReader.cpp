@@ -12,11 +12,12 @@
 #include <algorithm>
 #include <cstdint>
 #include <initializer_list>
-#include <limits>
+#include <memory>
 #include <optional>
 #include <sstream>
 #include <stdexcept>
 #include <string>
+#include <type_traits>
 #include <unordered_map>
 #include <utility>
 
@@ -39,25 +40,8 @@ struct Members : nlohmann::ordered_map<Key, Value, Rest...> {
 
 using Json = nlohmann::basic_json<Members>;
 
-// Sets this thread's locale to C during its lifetime: the parser reads numbers by strtod(), which
-// expects a decimal comma in some locales.
-class NumericLocale {
-public:
-    NumericLocale() = default;
-    NumericLocale(const NumericLocale&) = delete;
-    NumericLocale& operator=(const NumericLocale&) = delete;
-    ~NumericLocale()
-    {
-        uselocale(previous_);
-        if (locale_ != nullptr)
-            freelocale(locale_);
-    }
-
-private:
-    // Null when memory is exhausted: the thread keeps its locale.
-    const locale_t locale_ = newlocale(LC_ALL_MASK, "C", nullptr);
-    const locale_t previous_ = uselocale(locale_);
-};
+// Undoes a change of locales at the end of its lifetime.
+using LocaleChange = std::unique_ptr<std::remove_pointer_t<locale_t>, void (*)(locale_t)>;
 
 // Returns a part of the file as an error message shows it: short and printable.
 std::string excerpt(std::string_view text)
@@ -78,7 +62,7 @@ std::string quote(std::string_view text)
 [[noreturn]] void failAt(std::string_view text, std::size_t at, std::string_view reason)
 {
     const std::string_view before = text.substr(0, at);
-    const auto line = std::count(before.begin(), before.end(), '\n') + 1;
+    const auto line = std::ranges::count(before, '\n') + 1;
     const std::size_t column = before.size() - (before.rfind('\n') + 1) + 1; // npos + 1 is 0
     throw std::runtime_error("line " + std::to_string(line) + ", column " + std::to_string(column) +
                              ": " + excerpt(reason));
@@ -117,7 +101,10 @@ Json parsed(std::string_view text)
     if (const std::size_t nul = text.find('\0'); nul != std::string_view::npos)
         failAt(text, nul, "the file holds the character NUL");
     requireShallow(text);
-    const NumericLocale decimalPoint;
+    // The parser reads numbers by strtod(), which expects a decimal comma in some locales. Where
+    // memory is exhausted, the thread keeps its locale.
+    const LocaleChange plain(newlocale(LC_ALL_MASK, "C", nullptr), &freelocale);
+    const LocaleChange former(uselocale(plain.get()), [](locale_t locale) { uselocale(locale); });
     std::istringstream in{std::string(text)};
     try {
         return Json::parse(in);
@@ -181,21 +168,18 @@ void read(const Json& value, std::string& text)
 void read(const Json& value, NodeLexicon::NodeType& type)
 {
     constexpr const char* expected = R"("temperature", "voltage" or "tachometer")";
-    const auto& name = require<std::string>(value, expected);
-    for (const Member::TypeName& known : Member::typeNames) {
-        if (known.name == name) {
-            type = known.type;
-            return;
-        }
-    }
-    refuse(expected, value);
+    const auto* const known = std::ranges::find(Member::typeNames,
+        std::string_view(require<std::string>(value, expected)), &Member::TypeName::name);
+    if (known == Member::typeNames.end())
+        refuse(expected, value);
+    type = known->type;
 }
 
 void read(const Json& value, unsigned& code)
 {
     constexpr const char* expected = "an unsigned 32-bit integer";
     const auto number = require<std::uint64_t>(value, expected);
-    if (number > std::numeric_limits<std::uint32_t>::max())
+    if (!std::in_range<std::uint32_t>(number))
         refuse(expected, value);
     code = static_cast<unsigned>(number);
 }
@@ -269,33 +253,33 @@ void read(const Json& value, std::vector<MachineFileNode>& nodes)
     readArray(value, nodes, "an array");
     std::unordered_map<std::string_view, std::size_t> indices; // by path
     for (const MachineFileNode& node : nodes) {
-        const std::size_t index = indices.size();
-        const auto [known, isNew] = indices.try_emplace(node.path, index);
+        const auto [known, isNew] = indices.try_emplace(node.path, indices.size());
         if (!isNew)
             throw RefusedValue{quote(node.path) + " is the path of /nodes/" +
                                    std::to_string(known->second) + " already",
-                Json::json_pointer() / index / std::string(Member::path)};
+                Json::json_pointer() / indices.size() / std::string(Member::path)};
     }
 }
 
 MachineFile fileOf(const Json& value)
 {
-    std::vector<MachineFileNode> nodes;
+    MachineFile file;
     std::optional<double> period;
     std::optional<double> time;
     readMembers(value, [&](auto visit) {
-        visit(Member::nodes, nodes);
+        visit(Member::nodes, file.nodes);
         visit(Member::period, period);
         visit(Member::time, time);
     });
     requireMembers(value, {Member::nodes});
-    if (!period && !time)
-        return {std::move(nodes)};
-    requireMembers(value, {Member::period, Member::time});
-    if (*period <= 0)
-        throw RefusedValue{
-            "the period is not above 0", Json::json_pointer() / std::string(Member::period)};
-    return {std::move(nodes), Renewal{*period, *time}};
+    if (period || time) {
+        requireMembers(value, {Member::period, Member::time});
+        if (*period <= 0)
+            throw RefusedValue{
+                "the period is not above 0", Json::json_pointer() / std::string(Member::period)};
+        file.renewal = Renewal{*period, *time};
+    }
+    return file;
 }
 
 } // namespace
