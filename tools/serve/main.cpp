@@ -27,8 +27,6 @@
 #include "tools/serve/ServiceManager.h"
 #include "tools/serve/Signals.h"
 
-#include <CLI/CLI.hpp>
-
 #include <unistd.h>
 
 #include <cerrno>
