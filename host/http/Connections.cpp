@@ -29,7 +29,7 @@ bool hasClientFinished(int descriptor)
 }
 
 // For this time, new connections are closed after all others, since their clients may be sending
-// the first request or may be in a TLS handshake. A request arrives whole in it, as a rule.
+// the first request or may be in a TLS handshake. Most requests arrive within it.
 constexpr std::chrono::seconds timeToSend{2};
 
 // Returns whether the client has sent what the thread of the connection has yet to read.
@@ -100,14 +100,15 @@ bool Connections::makeRoomAmong(const Counts& counts, std::size_t maximum)
         const auto begin = each->deadline - timeoutOf(each->phase);
         return begin + timeToSend < now;
     };
-    std::erase_if(counted, [&](const ClientConnection* each) {
-        return each->phase == Phase::receiving
-                   ? !hadTime(each)
-                   : each->phase != Phase::idle || hasUnreadBytes(each->descriptor);
-    });
+    const auto mayClose = [&](const ClientConnection* each) {
+        const bool isSlow = each->phase == Phase::receiving && hadTime(each);
+        return (each->phase == Phase::idle || isSlow) && !hasUnreadBytes(each->descriptor);
+    };
+    std::erase_if(counted, [&](const ClientConnection* each) { return !mayClose(each); });
     const auto rank = [&](const ClientConnection* each) {
+        const bool isSlow = each->phase == Phase::receiving;
         const bool isNew = each->use == Use::nothing && !hadTime(each);
-        return std::tuple(isNew, each->phase == Phase::receiving, each->use, each->deadline);
+        return std::tuple(isNew, isSlow, isSlow ? Use::nothing : each->use, each->deadline);
     };
     const auto found = std::ranges::min_element(counted, {}, rank);
     if (found == counted.end())
@@ -126,6 +127,8 @@ void Connections::remove(ClientConnection& connection)
     const auto place = std::find_if(all_.begin(), all_.end(),
         [&](const ClientConnection& each) { return &each == &connection; });
     removed.splice(removed.end(), all_, place);
+    if (all_.empty())
+        becameIdle_.notify_all();
 }
 
 void Connections::enter(ClientConnection& connection, Phase phase)
@@ -212,6 +215,14 @@ void Connections::beginShutdown()
         }
     }
     changed_.notify_all();
+}
+
+void Connections::closeAll()
+{
+    std::unique_lock lock(mutex_);
+    for (const ClientConnection& connection : all_)
+        ::shutdown(connection.descriptor, SHUT_RDWR);
+    becameIdle_.wait(lock, [this] { return all_.empty(); });
 }
 
 bool Connections::isShuttingDown() const

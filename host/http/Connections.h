@@ -98,6 +98,9 @@ public:
     // the others after their answer, or soon when their request does not arrive. Idempotent.
     void beginShutdown();
     bool isShuttingDown() const;
+    // Closes all connections, and blocks until they are removed. REQUIRES: the shutdown has begun,
+    // and no further connection is accepted.
+    void closeAll();
     // Blocks until the time, but no longer than until the shutdown begins or the client closes the
     // connection. Returns whether the time was reached. REQUIRES: the phase is `working`.
     bool waitUntil(ClientConnection& connection, Clock::time_point time);
@@ -129,8 +132,9 @@ private:
     // Notified when the first connection is added, when a wait is interrupted and when the shutdown
     // begins.
     std::condition_variable_any changed_;
-    // Notified when the last request in progress ends. It is a condition of its own, since the
-    // watcher, which waits for changed_, would run after each request of a client.
+    // Notified when the last request in progress ends and when the last connection is removed. It
+    // is a condition of its own, since the watcher, which waits for changed_, would run after each
+    // request of a client.
     std::condition_variable becameIdle_;
     std::list<ClientConnection> all_;
     std::size_t busy_ = 0; // connections that are not idle

@@ -221,6 +221,9 @@ Daemon::~Daemon()
 {
     stopAccepting();
     service_.connections.beginShutdown(); // no thread waits until its sign-in is refused
+    // libmicrohttpd 0.9.75 dereferences null when it is stopped while it refuses a request by
+    // itself.
+    service_.connections.closeAll();
 }
 
 void Daemon::logLine(void* daemon, const char* format, std::va_list arguments) noexcept

@@ -23,8 +23,8 @@ public:
     // Throws std::runtime_error when the library fails. The service must outlive it, and have a
     // certificate where the socket is encrypted.
     Daemon(Service& service, ListeningSocket socket);
-    // Begins the shutdown of the service's connections, closes those of this daemon and joins their
-    // threads.
+    // Begins the shutdown of the service's connections, closes all of them and joins the threads of
+    // this daemon.
     ~Daemon();
     Daemon(const Daemon&) = delete;
     Daemon& operator=(const Daemon&) = delete;

@@ -17,7 +17,7 @@ public:
     // file without users; and what readSecretFile throws.
     static Passwords read(const std::string& file);
 
-    // Parses the content of such a file, whose name errors have.
+    // Parses the content of such a file, which errors name.
     Passwords(std::string_view text, const std::string& file);
 
     // Takes as long as the user's hash demands, whether the password is right or not. An unknown

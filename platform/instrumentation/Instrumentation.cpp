@@ -6,9 +6,7 @@
 #include "platform/instrumentation/OpenSource.h"
 #include "platform/instrumentation/Source.h"
 #include "platform/text/Escape.h"
-#include "platform/text/Utf8.h"
 
-#include <algorithm>
 #include <cstdlib>
 #include <exception>
 #include <optional>
@@ -217,9 +215,7 @@ std::string Instrumentation::getPathToNode() const
 
 std::string Instrumentation::convertPathToString(const std::string& path) const
 {
-    const bool isPrintable = std::all_of(path.begin(), path.end(),
-        [](char character) { return character >= ' ' && character <= '~'; });
-    return isPrintable ? path : Text::escapeControls(Text::toValidUtf8(path));
+    return Text::toOneLine(path);
 }
 
 std::string Instrumentation::getNodeDescription() const

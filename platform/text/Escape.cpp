@@ -2,6 +2,8 @@
 
 #include "platform/text/Escape.h"
 
+#include "platform/text/Utf8.h"
+
 #include <algorithm>
 
 namespace Text {
@@ -45,12 +47,19 @@ void appendEscaped(std::string& out, std::string_view text, Backslash backslash)
     }
 }
 
-std::string escapeControls(std::string_view text)
+bool isPrintableAscii(std::string_view text)
 {
-    std::string printable;
-    printable.reserve(text.size());
-    appendEscaped(printable, text, Backslash::kept);
-    return printable;
+    return std::all_of(text.begin(), text.end(), [](char c) { return c >= ' ' && c <= '~'; });
+}
+
+std::string toOneLine(std::string_view text)
+{
+    if (isPrintableAscii(text))
+        return std::string(text);
+    std::string line;
+    line.reserve(text.size());
+    appendEscaped(line, toValidUtf8(text), Backslash::kept);
+    return line;
 }
 
 } // namespace Text

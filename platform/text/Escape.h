@@ -16,7 +16,11 @@ enum class Backslash { kept, doubled };
 // Other bytes, those from 0x80 up among them, stay as they are.
 void appendEscaped(std::string& out, std::string_view text, Backslash backslash);
 
-// Returns the text escaped in that way, with its backslashes kept.
-std::string escapeControls(std::string_view text);
+// Returns whether the text consists of printable ASCII only, as most do.
+bool isPrintableAscii(std::string_view text);
+
+// Returns the text as valid UTF-8 (see toValidUtf8) on one line: escaped in that way, with its
+// backslashes kept.
+std::string toOneLine(std::string_view text);
 
 } // namespace Text

@@ -196,7 +196,8 @@ TEST_F(ElementCapabilitiesInstanceFaultTest, APathWhoseKeyCountReportsAFailureLe
 TEST_F(ElementCapabilitiesInstanceFaultTest, TheCapabilitiesAreGivenTheirNamespaceBeforeTheSensor)
 {
     expectNameSpacesInOrder(nameRequest, Class, CapabilitiesClass, SensorClass);
-    // Of two sensors, each: by its provider, before the capabilities are read and after that.
+    // Three times for each of two sensors: by its provider, before the capabilities are read and
+    // after that.
     EXPECT_EQ(timesCalled("setNameSpace", SensorClass), 6);
 }
 

@@ -43,7 +43,7 @@ public:
         source_.selectMachine();
         ChipDevices devices;
         const ProviderClient provider(source_.sensorProviderFile());
-        const Harvest harvest = readHarvest(&provider.manager(), devices);
+        const Harvest harvest = readHarvest(provider.manager(), devices);
         Exposition exposition(ExpositionForm::text);
         SensorMetrics sensors(0); // there is no further exposition
         addHarvest(exposition, harvest, sensors);

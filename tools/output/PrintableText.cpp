@@ -2,9 +2,9 @@
 
 #include "tools/output/PrintableText.h"
 
+#include "platform/text/Escape.h"
 #include "platform/text/Utf8.h"
 
-#include <algorithm>
 #include <array>
 #include <cstdio>
 
@@ -18,12 +18,6 @@ constexpr std::string_view asciiEllipsis = "~";
 
 constexpr char32_t lastOfAscii = 0x7E; // the last printable one
 constexpr char32_t degreeSign = 0xB0;
-
-// Returns whether the text consists of printable ASCII only, as most do.
-bool isPlain(std::string_view text)
-{
-    return std::all_of(text.begin(), text.end(), [](char c) { return c >= ' ' && c <= '~'; });
-}
 
 // Returns the escape of an unprintable character.
 std::string escapeOf(char32_t character)
@@ -48,7 +42,7 @@ std::string escapeOf(char32_t character)
 
 std::string printable(std::string_view text, bool isUtf8)
 {
-    if (isPlain(text))
+    if (Text::isPrintableAscii(text))
         return std::string(text);
     std::string result;
     result.reserve(text.size());
@@ -68,7 +62,7 @@ std::string printable(std::string_view text, bool isUtf8)
 
 std::size_t displayWidth(std::string_view text)
 {
-    if (isPlain(text))
+    if (Text::isPrintableAscii(text))
         return text.size();
     std::size_t width = 0;
     while (!text.empty()) {

@@ -21,7 +21,8 @@ namespace Tools {
 // The page and what its scripts read, as resources of a server.
 class PageService {
 public:
-    // Where there is a history, it is written to its folder; without one it is in memory only.
+    // Where there is a history, it is written to its folder, or, without a
+    // folder, kept in memory only.
     // Where `folder` lacks the files of the page, requests for the page are refused with the
     // reason, and the other resources work. The harvests must outlive the object. Throws
     // std::runtime_error where the history cannot be kept.

@@ -46,18 +46,22 @@ Sensors readInstances(const Host::Manager& manager)
 
 Sensors readRecords()
 {
-    std::vector<SensorRecord> records;
-    getSensorInstances(records);
+    std::vector<ProviderRecord> records;
+    if (getSensorInstances(records))
+        return {}; // the provider has no instances then
     const Vorn::SensorProfileProvider::SensorIndex index(records);
     Sensors sensors;
     sensors.reserve(index.size());
-    SensorRecord copy; // keeps its memory from record to record
-    for (const SensorRecord* const record : index.inOrder()) {
+    ProviderRecord copy; // keeps its memory from record to record
+    for (const ProviderRecord* const record : index.inOrder()) {
         copy = *record;
         sensors.emplace_back(copy);
     }
     return sensors;
 }
+
+// Otherwise the tool's list of chips would replace the provider's while that uses it.
+constexpr bool isLibsensorsPrivate = SENSOR_PROFILE_PRIVATE_LIBSENSORS;
 
 constexpr auto anyAge = Vorn::Hwmon::ChipList::Clock::duration::max();
 
@@ -68,7 +72,7 @@ using Chips = std::shared_ptr<const Vorn::Hwmon::Catalogue>;
 Chips listChips(Vorn::Hwmon::ChipList::Clock::duration ageOfAttributes)
 {
     try {
-        if (canReadRecords())
+        if (isLibsensorsPrivate)
             return Vorn::Hwmon::ChipList::instance().present(ageOfAttributes);
         Vorn::Hwmon::Catalogue chips;
         chips.machine = Vorn::Hwmon::presentMachine();
@@ -131,13 +135,16 @@ std::vector<std::string> Harvest::lostSources() const
 
 bool canReadRecords()
 {
-    return SENSOR_PROFILE_PRIVATE_LIBSENSORS;
+    return isLibsensorsPrivate;
 }
 
-Harvest readHarvest(const Host::Manager* manager, ChipDevices& devices)
+namespace {
+
+template <typename Read>
+Harvest harvestOf(const Read& read, ChipDevices& devices)
 {
     const auto begin = std::chrono::steady_clock::now();
-    Harvest harvest{manager == nullptr ? readRecords() : readInstances(*manager), {}};
+    Harvest harvest{read(), {}};
     const Chips chips = readsHwmon() ? listChips(anyAge) : nullptr;
     if (chips)
         devices.nameIn(harvest.sensors, chips->machine);
@@ -150,6 +157,18 @@ Harvest readHarvest(const Host::Manager* manager, ChipDevices& devices)
             statesOfSources(harvest.sensors, listChips(std::chrono::seconds(0)).get());
     harvest.duration = std::chrono::steady_clock::now() - begin;
     return harvest;
+}
+
+} // namespace
+
+Harvest readHarvest(const Host::Manager& manager, ChipDevices& devices)
+{
+    return harvestOf([&] { return readInstances(manager); }, devices);
+}
+
+Harvest readHarvestOfRecords(ChipDevices& devices)
+{
+    return harvestOf(readRecords, devices);
 }
 
 } // namespace Tools

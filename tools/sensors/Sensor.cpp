@@ -7,7 +7,6 @@
 #include "host/broker/String.h"
 #include "model/Sensor.h"
 #include "platform/text/Escape.h"
-#include "platform/text/Utf8.h"
 #include "platform/utilities/ProviderUtilities.h"
 #include "tools/cim/Units.h"
 
@@ -74,10 +73,10 @@ private:
     decltype(std::declval<const Host::NamedValues&>().begin()) next_;
 };
 
-// Returns the code of an integer property; 0 for a null.
+// Returns the code of an integer property; 0, which is unknown, for a null and for what is no code.
 unsigned codeOf(std::optional<std::int64_t> number)
 {
-    return static_cast<unsigned>(number.value_or(0));
+    return number && std::in_range<unsigned>(*number) ? static_cast<unsigned>(*number) : 0;
 }
 
 std::vector<unsigned> codesIn(const Host::Value& value)
@@ -166,7 +165,7 @@ Sensor::Sensor(const Host::Instance& from) : instance(&from)
         limits.at(i) = quantityOf(properties.number(limitKinds.at(i).property), modifier);
 }
 
-Sensor::Sensor(SensorRecord& record)
+Sensor::Sensor(ProviderRecord& record)
 {
     identify(record.getElementName(), record.deviceID());
     possibleStates = wordsOf(record.getPossibleStates(), std::identity());
@@ -179,7 +178,7 @@ Sensor::Sensor(SensorRecord& record)
     const std::int32_t modifier = record.getUnitModifier();
     setReading(
         quantityOf(record.getCurrentReading(), modifier), record.getEnabledState(), statuses);
-    const std::array<std::int32_t, limitKinds.size()> thresholds = {
+    const std::array<std::int32_t, limitKinds.size()> thresholds = {// in the order of limitKinds
         record.getLowerThresholdNonCritical(), record.getLowerThresholdCritical(),
         record.getLowerThresholdFatal(), record.getUpperThresholdNonCritical(),
         record.getUpperThresholdCritical(), record.getUpperThresholdFatal()};
@@ -202,12 +201,7 @@ void Sensor::setReading(std::optional<Quantity> currentReading, unsigned enabled
 
 std::string deviceIdOf(const std::string& description, std::string_view path)
 {
-    std::string id = description + ":";
-    // Most paths need no change, and each scrape has the identifiers of all sensors made.
-    const bool isPlain =
-        std::all_of(path.begin(), path.end(), [](char c) { return c >= ' ' && c <= '~'; });
-    id += isPlain ? std::string(path) : Text::escapeControls(Text::toValidUtf8(path));
-    return Vorn::stripSpaces(id);
+    return Vorn::stripSpaces(description + ":" + Text::toOneLine(path));
 }
 
 void Sensor::setNames(const std::string& description, std::string_view itsPath)

@@ -25,8 +25,8 @@ class Sensor;
 
 namespace Tools {
 
-// The provider's record of a sensor.
-using SensorRecord = Vorn::SensorProfileProvider::Sensor;
+// A record of which the provider makes an instance.
+using ProviderRecord = Vorn::SensorProfileProvider::Sensor;
 
 // A reading or a limit: `value` times ten to the power of `modifier`. Readings and limits of a
 // sensor have the same modifier and are rounded alike, so that no reading at a limit is shown below
@@ -67,9 +67,9 @@ struct Sensor {
     Sensor() = default;
     // Interprets an instance of ZUMLO_NumericSensor.
     explicit Sensor(const Host::Instance& from);
-    // Interprets a record of the provider, as if it were the instance made of it. The record counts
-    // how often it is read.
-    explicit Sensor(SensorRecord& record);
+    // Interprets a record as the instance that is made of it. Changes the record: its possible
+    // states are longer at each further reading. REQUIRES: nobody has read them.
+    explicit Sensor(ProviderRecord& record);
 
     // Sets the names that the provider gives a node.
     void setNames(const std::string& description, std::string_view itsPath);

@@ -12,7 +12,8 @@
 
 namespace Tools {
 
-// The size of all texts that clients have yet to fetch. Three of the metrics of 10,000 sensors fit.
+// The size of all texts that clients have yet to fetch. The metrics of 10,000 sensors fit three
+// times.
 inline constexpr std::size_t maximumUnsentBytes = std::size_t{64} << 20;
 
 // The answer to clients whose text does not fit.

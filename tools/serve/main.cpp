@@ -155,10 +155,11 @@ public:
         MemoryReturn memoryReturn(objects);
         RequestCounts operations(memoryReturn);
         ChipDevices devices;
-        const bool isProviderAsked = source_.provider() || !canReadRecords();
-        const Host::Manager* const asked = isProviderAsked ? &objects.manager() : nullptr;
-        SingleFlight<Harvest> harvests([asked, &devices] {
-            return std::make_shared<const Harvest>(readHarvest(asked, devices));
+        const bool readsRecords = !source_.provider() && canReadRecords();
+        SingleFlight<Harvest> harvests([&objects, &devices, readsRecords] {
+            return std::make_shared<const Harvest>(readsRecords
+                                                       ? readHarvestOfRecords(devices)
+                                                       : readHarvest(objects.manager(), devices));
         });
         Host::Http::ResponseCounts responses;
         MetricsResource metrics(harvests, [&](Exposition& exposition) {

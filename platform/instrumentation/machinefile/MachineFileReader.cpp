@@ -40,16 +40,15 @@ struct Members : nlohmann::ordered_map<Key, Value, Rest...> {
 
 using Json = nlohmann::basic_json<Members>;
 
-// Undoes a change of locales at the end of its lifetime.
-using LocaleChange = std::unique_ptr<std::remove_pointer_t<locale_t>, void (*)(locale_t)>;
+// Calls a function with a locale at the end of its lifetime.
+using LocalePointer = std::unique_ptr<std::remove_pointer_t<locale_t>, void (*)(locale_t)>;
 
 // Returns a part of the file as an error message shows it: short and printable.
 std::string excerpt(std::string_view text)
 {
     constexpr std::size_t maximumExcerpt = 160;
     const std::string_view beginning = Text::cutAtCharacter(text, maximumExcerpt);
-    return Text::escapeControls(Text::toValidUtf8(beginning)) +
-           (beginning.size() < text.size() ? "..." : "");
+    return Text::toOneLine(beginning) + (beginning.size() < text.size() ? "..." : "");
 }
 
 std::string quote(std::string_view text)
@@ -102,9 +101,9 @@ Json parsed(std::string_view text)
         failAt(text, nul, "the file holds the character NUL");
     requireShallow(text);
     // The parser reads numbers by strtod(), which expects a decimal comma in some locales. Where
-    // memory is exhausted, the thread keeps its locale.
-    const LocaleChange plain(newlocale(LC_ALL_MASK, "C", nullptr), &freelocale);
-    const LocaleChange former(uselocale(plain.get()), [](locale_t locale) { uselocale(locale); });
+    // memory is exhausted, the thread keeps its locale. It is restored before the other is freed.
+    const LocalePointer plain(newlocale(LC_ALL_MASK, "C", nullptr), &freelocale);
+    const LocalePointer former(uselocale(plain.get()), [](locale_t locale) { uselocale(locale); });
     std::istringstream in{std::string(text)};
     try {
         return Json::parse(in);
@@ -168,7 +167,7 @@ void read(const Json& value, std::string& text)
 void read(const Json& value, NodeLexicon::NodeType& type)
 {
     constexpr const char* expected = R"("temperature", "voltage" or "tachometer")";
-    const auto* const known = std::ranges::find(Member::typeNames,
+    const auto known = std::ranges::find(Member::typeNames,
         std::string_view(require<std::string>(value, expected)), &Member::TypeName::name);
     if (known == Member::typeNames.end())
         refuse(expected, value);

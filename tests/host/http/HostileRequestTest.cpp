@@ -32,6 +32,20 @@ TEST_F(HostileRequestTest, LineWithoutEndIsRefused)
     EXPECT_THAT(client.receiveSome(), StartsWith("HTTP/1.1 4"));
 }
 
+TEST_F(HostileRequestTest, ServerMayEndWhileTheyAreRefused)
+{
+    for (int i = 0; i < 40; ++i) {
+        std::vector<HttpClient> clients;
+        for (int n = 0; n < 8; ++n) {
+            clients.push_back(connect());
+            clients.back().trySend(std::string(100'000, 'A'));
+        }
+        std::this_thread::sleep_for(std::chrono::microseconds(50 * i));
+        server.reset();
+        start();
+    }
+}
+
 TEST_F(HostileRequestTest, QueriesWithoutEndAreCutOff)
 {
     for (const int count : {101, 900, 2000}) {

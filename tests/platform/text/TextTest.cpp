@@ -11,8 +11,8 @@ namespace TextTests {
 using namespace std::string_literals;
 using Text::Backslash;
 using Text::cutAtCharacter;
-using Text::escapeControls;
 using Text::firstCharacter;
+using Text::toOneLine;
 using Text::toValidUtf8;
 using Text::trimmed;
 
@@ -107,24 +107,24 @@ TEST(EscapeTest, LeavesPlainTextAlone)
 {
     const std::string text = "ENTERING: f() in F [Line: 1],Parameters List:  broker=0x7f~!\"#$%&'";
     EXPECT_EQ(escapedForTheLog(text), text);
-    EXPECT_EQ(escapeControls(text), text);
+    EXPECT_EQ(toOneLine(text), text);
 }
 
 TEST(EscapeTest, WritesANewlineAsTwoCharacters)
 {
-    EXPECT_EQ(escapeControls("a\nb\n"), "a\\nb\\n");
+    EXPECT_EQ(toOneLine("a\nb\n"), "a\\nb\\n");
 }
 
 TEST(EscapeTest, WritesOtherControlCharactersInHexadecimal)
 {
-    EXPECT_EQ(escapeControls("\r\t\x1B[31m\x7F"), "\\x0D\\x09\\x1B[31m\\x7F");
-    EXPECT_EQ(escapeControls("\0x"s), "\\x00x");
+    EXPECT_EQ(toOneLine("\r\t\x1B[31m\x7F"), "\\x0D\\x09\\x1B[31m\\x7F");
+    EXPECT_EQ(toOneLine("\0x"s), "\\x00x");
 }
 
 TEST(EscapeTest, EscapesEveryControlCharacter)
 {
     for (char code = 0; code < 0x20; ++code) {
-        const std::string line = escapeControls(std::string(1, code));
+        const std::string line = toOneLine(std::string(1, code));
         EXPECT_EQ(line.front(), '\\') << int{code};
         EXPECT_EQ(line.find_first_of("\n\r\x1B"), std::string::npos) << int{code};
     }
@@ -134,12 +134,16 @@ TEST(EscapeTest, DoublesABackslashWhereItCouldBeAnEscape)
 {
     EXPECT_EQ(escapedForTheLog("\\n"), "\\\\n");
     EXPECT_NE(escapedForTheLog("\\n"), escapedForTheLog("\n"));
-    EXPECT_EQ(escapeControls("\\n"), "\\n");
+    EXPECT_EQ(toOneLine("\\n"), "\\n");
 }
 
 TEST(EscapeTest, KeepsUtf8)
 {
-    EXPECT_EQ(escapeControls("Lüfter ファン 1"), "Lüfter ファン 1");
+    EXPECT_EQ(toOneLine("Lüfter ファン 1"), "Lüfter ファン 1");
+    EXPECT_EQ(toOneLine("L\xFC"
+                        "fter\n"),
+        "L\xEF\xBF\xBD"
+        "fter\\n");
 }
 
 } // namespace TextTests
