@@ -28,14 +28,41 @@ using testing::StartsWith;
 const std::string demonstration = SENSOR_PROFILE_SOURCE_DIR "/schema/demo-model.json";
 const std::string golden = SENSOR_PROFILE_SOURCE_DIR "/tests/data/tools/demonstration-metrics.txt";
 
+std::string get(const std::string& fields = "", const std::string& method = "GET")
+{
+    return method + " /metrics HTTP/1.1\r\nHost: localhost\r\n" + fields + "\r\n";
+}
+
+// Returns which sources are up.
+std::map<std::string, double> sourcesIn(const std::string& text)
+{
+    std::map<std::string, double> states;
+    for (const Series& each : seriesIn(text))
+        if (each.name == "sensor_profile_source_up") {
+            EXPECT_TRUE(states.emplace(each.labels.at("source"), each.value).second);
+        }
+    return states;
+}
+
 class MetricsTest : public ServeTest {
 protected:
+    // Returns the metrics of the sources, which the command reads through the provider. Expects
+    // those of a server, which reads records, to be the same.
+    std::string metricsOfSources(const std::string& sources) const
+    {
+        const std::map<std::string, std::string> environment = {{"VORN_INSTRUMENTATION", sources}};
+        const std::string text = run({"metrics"}, {.environment = environment}).out;
+        const ServerProcess server({}, environment);
+        const std::string served = ask(HttpClient(server.port()), get()).body;
+        EXPECT_THAT(comparable(served), StartsWith(comparable(text)));
+        EXPECT_EQ(sourcesIn(served), sourcesIn(text));
+        return text;
+    }
+
     // Returns the metrics of a machine that consists of the nodes.
     std::string metricsOf(const std::string& nodes) const
     {
-        const Ended ended = run({"metrics", "--model", model(nodes)});
-        EXPECT_EQ(ended.err, "");
-        return ended.out;
+        return metricsOfSources("model:" + model(nodes));
     }
 };
 
@@ -154,23 +181,6 @@ TEST_F(MetricsTest, MachineWithoutSensorsIsReported)
     EXPECT_THAT(ended.err, HasSubstr("this machine has no sensors"));
 }
 
-// Returns the metrics of the sources.
-std::string metricsOfSources(const std::string& list)
-{
-    return run({"metrics"}, {.environment = {{"VORN_INSTRUMENTATION", list}}}).out;
-}
-
-// Returns which sources are up.
-std::map<std::string, double> sourcesIn(const std::string& text)
-{
-    std::map<std::string, double> states;
-    for (const Series& each : seriesIn(text))
-        if (each.name == "sensor_profile_source_up") {
-            EXPECT_TRUE(states.emplace(each.labels.at("source"), each.value).second);
-        }
-    return states;
-}
-
 using States = std::map<std::string, double>;
 
 TEST_F(MetricsTest, SourceThatFailsTakesNoSensorsOfOthersAway)
@@ -223,11 +233,6 @@ TEST_F(MetricsTest, OddDescriptionsAreThoseOfTheProvider)
 
 // ---- The server ----
 
-std::string get(const std::string& fields = "", const std::string& method = "GET")
-{
-    return method + " /metrics HTTP/1.1\r\nHost: localhost\r\n" + fields + "\r\n";
-}
-
 TEST_F(MetricsTest, ServerGivesThoseOfTheCommandAndItsOwn)
 {
     const ServerProcess server(withModel());
@@ -258,7 +263,6 @@ TEST_F(MetricsTest, ServerGivesThoseOfTheCommandAndItsOwn)
     EXPECT_EQ(ended.out + ended.err, "");
 }
 
-// The command reads them through the provider, and so does a server that is given one.
 TEST_F(MetricsTest, ServerReadsWhatTheProviderPublishes)
 {
     nlohmann::json nodes;
@@ -279,11 +283,9 @@ TEST_F(MetricsTest, ServerReadsWhatTheProviderPublishes)
     const std::string twice = source + "," + source; // of two with one DeviceID, one is published
     const std::string expected = comparable(metricsOfSources(twice));
     EXPECT_EQ(countOf(expected, "\nsensor_profile_health{"), 3U * 28 * 4);
-    for (const std::vector<std::string>& options :
-        {std::vector<std::string>{}, {"--provider", sensorLibrary}}) {
-        const ServerProcess server(options, {{"VORN_INSTRUMENTATION", twice}});
-        EXPECT_THAT(comparable(ask(HttpClient(server.port()), get()).body), StartsWith(expected));
-    }
+    // A server that is given a provider reads through it, too.
+    const ServerProcess server({"--provider", sensorLibrary}, {{"VORN_INSTRUMENTATION", twice}});
+    EXPECT_THAT(comparable(ask(HttpClient(server.port()), get()).body), StartsWith(expected));
 }
 
 TEST_F(MetricsTest, OpenEnumerationsHoldObjects)

@@ -36,8 +36,9 @@ struct Harvest {
 // harvest has the sensors of the others.
 Harvest readHarvest(const Host::Manager& manager, ChipDevices& devices);
 
-// Reads the records of which the provider makes instances, in less time and with the same result.
-// REQUIRES: canReadRecords().
+// Reads the records of which the provider makes instances, in less time. Of up to 65,535 sensors,
+// which is the most that the provider publishes, the result is the same. REQUIRES:
+// canReadRecords().
 Harvest readHarvestOfRecords(ChipDevices& devices);
 
 // Returns whether records can be read beside a provider in this process. Otherwise both would use

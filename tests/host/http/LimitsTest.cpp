@@ -194,6 +194,20 @@ TEST_F(LimitsTest, ConnectionsWithoutARequestMakeRoom)
     EXPECT_EQ(finishPost(begun), 200);
 }
 
+TEST_F(LimitsTest, RequestThatHardlyArrivesMakesRoom)
+{
+    limits.maximumConnections = 2;
+    start();
+    HttpClient first = connect();
+    beginPost(first);
+    HttpClient second = connect();
+    beginPost(second);
+    std::this_thread::sleep_for(2100ms);
+    EXPECT_EQ(ask(post()).status, 200);
+    EXPECT_TRUE(first.isClosed());
+    EXPECT_EQ(finishPost(second), 200);
+}
+
 TEST_F(LimitsTest, AnswersThatNobodyFetchesLeaveRoomForNoMoreOfTheirKind)
 {
     limits.maximumUnsentObjects = 10'000;
